@@ -1,0 +1,1 @@
+# Installed files, the CMake package and pkg-config.

@@ -1,0 +1,33 @@
+# One object library per layer of the platform, so that a layer can be built and tested alone; one test
+# executable per folder of tests.
+
+# tarnell_layer(NAME [DEPENDS layer...]): every source of this folder's subfolder NAME.
+function(tarnell_layer name)
+  cmake_parse_arguments(ARG "" "" "DEPENDS" ${ARGN})
+  file(GLOB sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/src/${name}/*.cpp")
+  if(NOT sources)
+    return()
+  endif()
+  add_library(fbxsdk_${name} OBJECT ${sources})
+  target_link_libraries(fbxsdk_${name} PUBLIC tarnell_settings)
+  target_include_directories(fbxsdk_${name} PUBLIC
+    "${PROJECT_SOURCE_DIR}/fbxsdk/include" "${PROJECT_SOURCE_DIR}/fbxsdk/src")
+  target_compile_definitions(fbxsdk_${name} PRIVATE FBXSDK_BUILDING)
+  if(ARG_DEPENDS)
+    target_link_libraries(fbxsdk_${name} PUBLIC ${ARG_DEPENDS})
+  endif()
+endfunction()
+
+# tarnell_test(NAME FOLDER folder LINK target...): every *Test.cpp of the folder becomes one executable.
+function(tarnell_test name)
+  cmake_parse_arguments(ARG "" "FOLDER" "LINK" ${ARGN})
+  file(GLOB sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/${ARG_FOLDER}/*Test.cpp")
+  if(NOT sources)
+    return()
+  endif()
+  add_executable(${name} ${sources})
+  target_include_directories(${name} PRIVATE "${CMAKE_CURRENT_SOURCE_DIR}")
+  target_compile_definitions(${name} PRIVATE TARNELL_TEST_DATA="${PROJECT_SOURCE_DIR}/tests/data")
+  target_link_libraries(${name} PRIVATE ${ARG_LINK} tarnell_settings GTest::gtest GTest::gmock GTest::gtest_main)
+  gtest_discover_tests(${name} TEST_PREFIX "${name}." DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 600)
+endfunction()

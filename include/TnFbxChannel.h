@@ -1,0 +1,74 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// One animatable float property: a static value and, when animated, one sample per whole frame.
+#pragma once
+
+#include "TnFbxExport.h"
+#include "TnFbxTime.h"
+
+#include <vector>
+
+namespace Tarnell::Fbx {
+
+/// A static value and a dense run of samples over a closed range of whole frames.
+///
+/// There are no keys, tangents or curve types: sample k belongs to frame `startFrame + k`, and neighbours are joined by
+/// straight lines. The static value and the samples never change each other.
+class TARNELL_FBX_API TnFbxChannel {
+public:
+    static constexpr float kDefaultChannelValue = 0.0f;
+
+    /// Not animated, no samples, static value 0.
+    TnFbxChannel();
+    TnFbxChannel(const TnFbxChannel& other) = default;
+    ~TnFbxChannel();
+    TnFbxChannel& operator=(const TnFbxChannel& other);
+
+    /// Back to the state of a new channel, with `value` as the static value where it is given; always true.
+    /// The memory of the samples is kept for the next ones.
+    bool initChannel();
+    bool initChannel(float value);
+    bool deleteChannel();
+
+    /// Removes the samples; the time record and the static value stay as they are. Always true.
+    bool deleteAnimatedValues();
+
+    /// The static value, whether or not the channel is animated.
+    bool setValue(float value);
+    float getValue() const;
+
+    /// Sets the sample at one whole frame and makes the channel animated; always true.
+    ///
+    /// `frame` is truncated toward zero; what lies beyond the range of an int counts as the int nearest to it, and NaN
+    /// as the lowest int. A frame outside the range widens the range up to it, and the frames in between read 0, not
+    /// their neighbours and not the static value. Frame and rate of the time record are not touched.
+    /// Cost: memory for the whole gap; when that is not to be had the standard exception passes through and the
+    /// channel is as before.
+    bool setValueAt(float frame, float value);
+
+    /// Replaces all samples: `values[k]` is the sample of frame `time.getStartFrame() + k`. The whole record is kept.
+    ///
+    /// False, and nothing changes, when the range is inverted, `values` is empty, the rate is zero or below, or there
+    /// are fewer values than frames. Values beyond the range are accepted and never read.
+    bool setAnimatedValues(TnFbxTime time, const std::vector<float>& values);
+
+    /// The value at a possibly fractional frame; the static value when there are no samples.
+    ///
+    /// Outside the range the end samples hold. Within it the sample of the frame truncated toward zero is joined to the
+    /// next one, so that a fractional frame below zero is an extrapolation from the two samples to its right.
+    float getAnimatedValue(float frame) const;
+
+    bool getAnimated() const;
+    TnFbxTime getTime() const; ///< A copy of the time record.
+
+private:
+    void coverFrame(int frame);
+
+    bool mAnimated;
+    TnFbxTime mTime;
+    std::vector<float> mValues;
+    float mValue;
+};
+
+} // namespace Tarnell::Fbx

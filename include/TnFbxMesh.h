@@ -1,0 +1,117 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A polygon mesh as plain arrays, with one set of control points per frame where the points are animated.
+#pragma once
+
+#include "TnFbxExport.h"
+#include "TnFbxTransform.h"
+
+#include <vector>
+
+namespace Tarnell::Fbx {
+
+/// A polygon mesh.
+///
+/// Polygons are runs of polygon vertices, one after the other; each polygon vertex names a control point and carries a
+/// normal, a texture coordinate and a colour of its own. Point j of set k is control point k × number of control
+/// points + j. Points are in centimetres where the mesh was read from a file.
+class TARNELL_FBX_API TnFbxMesh : public TnFbxTransform {
+public:
+    /// A new control point, normal, texture coordinate and colour.
+    static constexpr float kDefaultMeshPX = 0.0f;
+    static constexpr float kDefaultMeshPY = 0.0f;
+    static constexpr float kDefaultMeshPZ = 0.0f;
+    static constexpr float kDefaultMeshNX = 0.0f;
+    static constexpr float kDefaultMeshNY = 0.0f;
+    static constexpr float kDefaultMeshNZ = 0.0f;
+    static constexpr float kDefaultMeshU = 0.0f;
+    static constexpr float kDefaultMeshV = 0.0f;
+    static constexpr float kDefaultMeshRed = 1.0f;
+    static constexpr float kDefaultMeshGreen = 1.0f;
+    static constexpr float kDefaultMeshBlue = 1.0f;
+    static constexpr float kDefaultMeshAlpha = 1.0f;
+
+    /// A default transform and no geometry.
+    TnFbxMesh();
+    TnFbxMesh(const TnFbxMesh& other) = default;
+    ~TnFbxMesh() override;
+
+    /// Copies the geometry; the target keeps its own transform and name.
+    TnFbxMesh& operator=(const TnFbxMesh& other);
+
+    /// Both remove the geometry; its memory is kept and the transform stays as it is. Always true.
+    bool initMesh();
+    bool deleteMesh();
+
+    /// Sizes all arrays for one set of control points: polygon sizes, point indices, points, normals and texture
+    /// coordinates of 0, colours of opaque white. The flags stay false until they are set.
+    /// False when a number is below 1; the mesh is empty then, whatever it held before.
+    bool allocateGeometryData(int numberOfPolygons, int numberOfControlPoints, int numberOfPolygonVertices);
+
+    /// Appends one control point and changes neither count; always true.
+    bool addControlPoint(float x, float y, float z);
+
+    /// Declares one more set, whose points the caller appends with `addControlPoint`; always true.
+    bool addControlPointSet();
+
+    /// One element of an array; control points are counted through all sets. False when there is no such element;
+    /// nothing changes then. What is stored is not checked: a point index may name a point that does not exist.
+    bool setPolygonVertexSize(int polygon, int size);
+    bool setPointIndex(int polygonVertex, int controlPoint);
+    bool setControlPoint(int index, float x, float y, float z);
+    bool setNormal(int polygonVertex, float x, float y, float z);
+    bool setUV(int polygonVertex, float u, float v);
+    bool setColour(int polygonVertex, float red, float green, float blue, float alpha);
+
+    int getPolygonVertexSize(int polygon) const; ///< −1 when there is no such polygon: no polygon has that size.
+    int getPointIndex(int polygonVertex) const;  ///< 0, a valid point, when there is no such polygon vertex.
+
+    /// False when there is no such element; the outputs are untouched then.
+    bool getControlPoint(int index, float& x, float& y, float& z) const;
+    bool getNormal(int polygonVertex, float& x, float& y, float& z) const;
+    bool getUV(int polygonVertex, float& u, float& v) const;
+    bool getColour(int polygonVertex, float& red, float& green, float& blue, float& alpha) const;
+
+    /// Whether the array carries data; the setters are always true.
+    bool setValidNormals(bool valid);
+    bool getValidNormals() const;
+    bool setValidUVs(bool valid);
+    bool getValidUVs() const;
+    bool setValidColours(bool valid);
+    bool getValidColours() const;
+
+    int getNumberOfPolygons() const;
+    int getNumberOfPolygonVertices() const;
+    int getNumberOfControlPoints() const; ///< Of one set.
+    int getNumberOfControlPointSets() const;
+
+private:
+    struct Vector {
+        float x, y, z;
+    };
+    struct TextureCoordinate {
+        float u, v;
+    };
+    struct Colour {
+        float red, green, blue, alpha;
+    };
+    struct Geometry {
+        std::vector<int> polygonVertexSizes;
+        std::vector<int> pointIndices;
+        std::vector<Vector> controlPoints;
+        std::vector<Vector> normals;
+        std::vector<TextureCoordinate> uvs;
+        std::vector<Colour> colours;
+        // after the arrays: where a copy runs out of memory, the counts are still those of an empty mesh
+        int controlPointCount = 0; // of one set
+        int controlPointSetCount = 0;
+        bool validNormals = false;
+        bool validUVs = false;
+        bool validColours = false;
+    };
+
+    Geometry mGeometry;
+};
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,54 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The time record that travels with every animated channel and through every read and write: a current frame, a
+// closed range of whole frames and the rate that turns them into seconds.
+#pragma once
+
+#include "TnFbxExport.h"
+
+namespace Tarnell::Fbx {
+
+/// A frame, a frame range and a frame rate, passed by value.
+///
+/// The record keeps no invariant: the range may be inverted and the rate zero or negative; its users check what they
+/// need.
+class TARNELL_FBX_API TnFbxTime {
+public:
+    static constexpr float kDefaultTimeFrame = 0.0f;
+    static constexpr float kDefaultTimeFrameRate = 24.0f;
+
+    /// Frame 0, range 0 to 0, 24 frames per second.
+    TnFbxTime();
+    TnFbxTime(const TnFbxTime& other) = default;
+    ~TnFbxTime();
+    TnFbxTime& operator=(const TnFbxTime& other) = default;
+
+    /// Both go back to the state of a new record; always true.
+    bool initTime();
+    bool deleteTime();
+
+    /// Store what is given, without a check; always true. The frame and the rate change only together with the rest.
+    bool setTime(float frame, int startFrame, int endFrame, float frameRate);
+    bool setStartFrame(int startFrame);
+    bool setEndFrame(int endFrame);
+
+    float getFrame() const;     ///< The current frame, possibly fractional.
+    int getStartFrame() const;  ///< First frame of the range.
+    int getEndFrame() const;    ///< Last frame of the range, inclusive.
+    float getFrameRate() const; ///< Frames per second.
+
+    /// The frame, the start and the end in seconds: frame ÷ rate in single precision, with no rounding and no offset.
+    /// A rate of 0 gives the infinity or the NaN of that division.
+    float getTime() const;
+    float getStartTime() const;
+    float getEndTime() const;
+
+private:
+    float mFrame;
+    int mStartFrame;
+    int mEndFrame;
+    float mFrameRate;
+};
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,59 @@
+#!/usr/bin/env python3
+# SPDX-License-Identifier: MIT
+# Copyright (c) Tarnell FBX contributors
+"""Shows which includes include_direction.py refuses and which it lets pass."""
+
+import tempfile
+import unittest
+from pathlib import Path
+
+from include_direction import violations
+
+
+class IncludeDirection(unittest.TestCase):
+    def check(self, file, source):
+        with tempfile.TemporaryDirectory() as folder:
+            path = Path(folder) / file
+            path.parent.mkdir(parents=True)
+            path.write_text(source, encoding="utf-8")
+            return violations(Path(folder))
+
+    def test_refuses_the_platform_in_the_model(self):
+        for file in ("include/TnFbxMesh.h", "src/model/TnFbxMesh.cpp", "src/model/ChannelSet.h"):
+            for include in ("<fbxsdk.h>", '"fbxsdk.h"', "<fbxsdk/FbxTime.h>", '"../../fbxsdk/include/fbxsdk.h"',
+                            '"scene/Node.h"'):
+                self.assertTrue(self.check(file, f"#pragma once\n#include {include}\n"), (file, include))
+
+    def test_refuses_the_adapter_and_the_facade_in_the_model(self):
+        for include in ('"FbxSdk.h"', '"Fbx.h"', '"sdk/SdkContext.h"', '"TnFbxError.h"'):
+            self.assertTrue(self.check("src/model/TnFbxMesh.cpp", f"#include {include}\n"), include)
+
+    def test_refuses_all_but_the_umbrella_in_the_adapter_and_the_facade(self):
+        for file in ("src/sdk/SdkContext.cpp", "src/sdk/SdkContext.h", "src/Fbx.cpp", "include/FbxSdk.h"):
+            for include in ("<fbxsdk/FbxTime.h>", '"scene/Node.h"', '"core/Time.h"', '"fbxsdk.h"'):
+                self.assertTrue(self.check(file, f"#include {include}\n"), (file, include))
+
+    def test_refuses_the_library_in_the_platform(self):
+        for file in ("fbxsdk/src/core/Time.cpp", "fbxsdk/include/fbxsdk/FbxTime.h"):
+            for include in ('"TnFbxTime.h"', "<FbxSdk.h>", '"model/FrameArithmetic.h"', '"Fbx.h"'):
+                self.assertTrue(self.check(file, f"#include {include}\n"), (file, include))
+
+    def test_names_file_and_line(self):
+        found = self.check("src/model/TnFbxMesh.cpp", "// mesh\n\n#  include <fbxsdk.h>\n")
+
+        self.assertEqual(len(found), 1)
+        self.assertTrue(found[0].startswith("src/model/TnFbxMesh.cpp:3: <fbxsdk.h>"), found)
+
+    def test_lets_pass_what_points_down(self):
+        for file, source in (
+            ("include/TnFbxMesh.h", '#include "TnFbxTransform.h"\n#include <vector>\n'),
+            ("src/model/TnFbxMesh.cpp", '// #include <fbxsdk.h>\n/*\n#include "Fbx.h"\n*/\n#include "ChannelSet.h"\n'),
+            ("src/sdk/SdkContext.cpp", '#include "FbxSdk.h"\n#include <fbxsdk.h>\n#include "model/FrameArithmetic.h"\n'),
+            ("src/Fbx.cpp", '#include "Fbx.h"\n#include "sdk/SdkContext.h"\n'),
+            ("fbxsdk/src/scene/Node.cpp", '#include <fbxsdk/FbxTime.h>\n#include "core/Strings.h"\n'),
+        ):
+            self.assertEqual(self.check(file, source), [], file)
+
+
+if __name__ == "__main__":
+    unittest.main()

@@ -1,0 +1,201 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What the value classes allocate, and what they hold when there is no memory to be had.
+//
+// The allocation functions of this executable are replaced by ones that count, and that refuse what is larger than a
+// limit, so that a gap of billions of frames can be asked for on any machine.
+#include "TnFbxCamera.h"
+#include "TnFbxMesh.h"
+
+#include "TransformOwner.h"
+
+#include <cstddef>
+#include <cstdlib>
+#include <limits>
+#include <new>
+#include <vector>
+
+namespace {
+
+std::size_t gAllocationLimit = std::numeric_limits<std::size_t>::max();
+std::size_t gAllocationCount = 0;
+
+void* allocate(std::size_t size) noexcept {
+    ++gAllocationCount;
+    return size <= gAllocationLimit ? std::malloc(size != 0 ? size : 1) : nullptr;
+}
+
+void* allocateOrThrow(std::size_t size) {
+    if (void* memory = allocate(size)) {
+        return memory;
+    }
+    throw std::bad_alloc();
+}
+
+} // namespace
+
+void* operator new(std::size_t size) { return allocateOrThrow(size); }
+void* operator new[](std::size_t size) { return allocateOrThrow(size); }
+void* operator new(std::size_t size, const std::nothrow_t&) noexcept { return allocate(size); }
+void* operator new[](std::size_t size, const std::nothrow_t&) noexcept { return allocate(size); }
+void operator delete(void* memory) noexcept { std::free(memory); }
+void operator delete[](void* memory) noexcept { std::free(memory); }
+void operator delete(void* memory, std::size_t) noexcept { std::free(memory); }
+void operator delete[](void* memory, std::size_t) noexcept { std::free(memory); }
+void operator delete(void* memory, const std::nothrow_t&) noexcept { std::free(memory); }
+void operator delete[](void* memory, const std::nothrow_t&) noexcept { std::free(memory); }
+
+namespace Tarnell::Fbx {
+namespace {
+
+using test::channelOver;
+using test::expectTime;
+using test::kInfinity;
+using test::kNaN;
+using test::range;
+using test::samplesOf;
+using Samples = std::vector<float>;
+
+/// Refuses allocations above a limit as long as it lives.
+class AllocationLimit {
+public:
+    explicit AllocationLimit(std::size_t bytes) { gAllocationLimit = bytes; }
+    ~AllocationLimit() { gAllocationLimit = std::numeric_limits<std::size_t>::max(); }
+    AllocationLimit(const AllocationLimit&) = delete;
+    AllocationLimit& operator=(const AllocationLimit&) = delete;
+};
+
+constexpr std::size_t kSixteenMegabytes = std::size_t{16} << 20;
+
+template <typename Work>
+std::size_t allocationsOf(Work work) {
+    const std::size_t before = gAllocationCount;
+    work();
+    return gAllocationCount - before;
+}
+
+TEST(Allocation, AGapWithoutMemoryThrowsAndLeavesTheChannelAsItWas) {
+    TnFbxChannel channel = channelOver(10, {1.0f, 2.0f});
+    const AllocationLimit limit(kSixteenMegabytes);
+
+    for (const float farFrame : {1e9f, -1e9f, kInfinity, -kInfinity, kNaN}) {
+        SCOPED_TRACE(farFrame);
+        EXPECT_THROW(channel.setValueAt(farFrame, 5.0f), std::bad_alloc);
+        EXPECT_TRUE(channel.getAnimated());
+        expectTime(channel.getTime(), 0.0f, 10, 11, 24.0f);
+        EXPECT_EQ(samplesOf(channel), (Samples{1.0f, 2.0f}));
+    }
+}
+
+TEST(Allocation, TheWidestGapOfAllThrowsToo) {
+    TnFbxChannel channel;
+    channel.setValueAt(-kInfinity, 1.0f);
+    const AllocationLimit limit(kSixteenMegabytes);
+
+    EXPECT_THROW(channel.setValueAt(kInfinity, 2.0f), std::bad_alloc);
+
+    EXPECT_EQ(channel.getTime().getStartFrame(), test::kLowest);
+    EXPECT_EQ(channel.getTime().getEndFrame(), test::kLowest);
+    EXPECT_EQ(channel.getAnimatedValue(0.0f), 1.0f);
+}
+
+TEST(Allocation, AGapThatFitsIsFilled) {
+    TnFbxChannel channel;
+    channel.setValueAt(0.0f, 1.0f);
+
+    channel.setValueAt(1e6f, 2.0f);
+
+    EXPECT_EQ(channel.getTime().getEndFrame(), 1000000);
+    EXPECT_EQ(channel.getAnimatedValue(0.0f), 1.0f);
+    EXPECT_EQ(channel.getAnimatedValue(500000.0f), 0.0f);
+    EXPECT_EQ(channel.getAnimatedValue(1e6f), 2.0f);
+}
+
+TEST(Allocation, ClearingAChannelKeepsItsMemoryForTheNextSamples) {
+    const Samples values(1000, 1.0f);
+    TnFbxChannel channel;
+    channel.setAnimatedValues(range(1, 1000), values);
+
+    EXPECT_EQ(allocationsOf([&] {
+                  channel.initChannel();
+                  channel.setAnimatedValues(range(1, 1000), values);
+                  channel.deleteAnimatedValues();
+                  channel.setValueAt(1000.0f, 1.0f);
+                  channel.setValueAt(1.0f, 1.0f);
+                  channel.deleteChannel();
+                  channel.setAnimatedValues(range(1, 1000), values);
+              }),
+              0u);
+}
+
+TEST(Allocation, KeyingFrameByFrameGrowsGeometrically) {
+    TnFbxChannel channel;
+
+    const std::size_t allocations = allocationsOf([&] {
+        for (int frame = 0; frame < 1024; ++frame) {
+            channel.setValueAt(static_cast<float>(frame), 1.0f);
+        }
+    });
+
+    EXPECT_EQ(allocations, 11u); // 1, 2, 4, … 1024 samples
+}
+
+TEST(Allocation, TheLookAtConversionAllocatesNothing) {
+    TnFbxCamera camera;
+    camera.setValueAt(TnFbxCamera::kFbxCameraRoll, range(1, 2), {1.0f, 2.0f});
+    float x = 0.0f;
+    float y = 0.0f;
+    float z = 0.0f;
+
+    EXPECT_EQ(allocationsOf([&] { camera.calculateCameraRotationAt(x, y, z, 1.5f); }), 0u);
+}
+
+TEST(Allocation, ClearingAMeshKeepsItsMemory) {
+    TnFbxMesh mesh;
+    mesh.allocateGeometryData(100, 100, 300);
+
+    EXPECT_EQ(allocationsOf([&] {
+                  mesh.initMesh();
+                  mesh.allocateGeometryData(100, 100, 300);
+                  mesh.deleteMesh();
+                  mesh.allocateGeometryData(50, 60, 200);
+              }),
+              0u);
+}
+
+TEST(Allocation, AMeshWithoutMemoryThrowsAndIsEmpty) {
+    TnFbxMesh mesh;
+    mesh.allocateGeometryData(2, 4, 6);
+    const AllocationLimit limit(kSixteenMegabytes);
+
+    // one array after the other is the first that does not fit
+    const struct {
+        int polygons, controlPoints, polygonVertices;
+    } tooLarge[] = {{test::kHighest, 1, 1}, {1, test::kHighest, 1}, {1, 1, test::kHighest}, {1, 1, 1200000}};
+    for (const auto& [polygons, controlPoints, polygonVertices] : tooLarge) {
+        EXPECT_THROW(mesh.allocateGeometryData(polygons, controlPoints, polygonVertices), std::bad_alloc);
+        EXPECT_EQ(mesh.getNumberOfPolygons(), 0);
+        EXPECT_EQ(mesh.getNumberOfPolygonVertices(), 0);
+        EXPECT_EQ(mesh.getNumberOfControlPoints(), 0);
+        EXPECT_EQ(mesh.getNumberOfControlPointSets(), 0);
+        EXPECT_EQ(mesh.getPolygonVertexSize(0), -1);
+    }
+}
+
+TEST(Allocation, AMeshCopiedWithoutMemoryHasNoPointsToItsName) {
+    TnFbxMesh source;
+    source.allocateGeometryData(1, 1, 1200000); // indices and uvs fit into the limit, colours do not
+    TnFbxMesh target;
+    target.allocateGeometryData(2, 4, 6);
+    const AllocationLimit limit(kSixteenMegabytes);
+
+    EXPECT_THROW(target = source, std::bad_alloc);
+
+    EXPECT_EQ(target.getNumberOfControlPoints(), 0);
+    EXPECT_EQ(target.getNumberOfControlPointSets(), 0);
+    EXPECT_FALSE(target.getValidColours());
+}
+
+} // namespace
+} // namespace Tarnell::Fbx
