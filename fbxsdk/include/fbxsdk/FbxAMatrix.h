@@ -1,0 +1,82 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// An affine transform: translation, rotation, scale.
+#pragma once
+
+#include <fbxsdk/FbxQuaternion.h>
+#include <fbxsdk/FbxVector4.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+/// Sixteen contiguous doubles, m[row][column].
+///
+/// Rows 0, 1, 2 are the images of the x, y and z axes, row 3 is the translation, column 3 is (0, 0, 0, 1). Products and
+/// formulas read as with column vectors all the same: `(a * b).MultT(v) == a.MultT(b.MultT(v))`.
+///
+/// Euler angles are in degrees and always of order XYZ. The w of vector arguments is ignored.
+class FBXSDK_DLL FbxAMatrix : public FbxDouble4x4 {
+public:
+    FbxAMatrix() { SetIdentity(); }
+    FbxAMatrix(const FbxVector4& pT, const FbxVector4& pR, const FbxVector4& pS) { SetTRS(pT, pR, pS); }
+
+    [[nodiscard]] double Get(int pY, int pX) const { return mData[pY][pX]; }
+    [[nodiscard]] FbxVector4 GetRow(int pY) const { return mData[pY]; }
+    [[nodiscard]] FbxVector4 GetColumn(int pX) const;
+
+    [[nodiscard]] FbxVector4 GetT() const;
+    /// Euler angles of the axes made unit length. At a pitch of ±90° the turn is all given to x, and z is 0.
+    ///
+    /// An axis scaled to zero is taken perpendicular to the others; when two or three are gone, what cannot be known
+    /// follows the coordinate axes. The result is never NaN for a finite matrix.
+    [[nodiscard]] FbxVector4 GetR() const;
+    /// Lengths of the axes; all three negative when the matrix mirrors.
+    [[nodiscard]] FbxVector4 GetS() const;
+    [[nodiscard]] FbxQuaternion GetQ() const;
+
+    void SetIdentity();
+    // Each of these replaces its own part and keeps the other two.
+    void SetT(const FbxVector4& pT);
+    void SetR(const FbxVector4& pR);
+    void SetS(const FbxVector4& pS);
+    void SetQ(const FbxQuaternion& pQ);
+    void SetTRS(const FbxVector4& pT, const FbxVector4& pR, const FbxVector4& pS);
+    void SetTQS(const FbxVector4& pT, const FbxQuaternion& pQ, const FbxVector4& pS);
+
+    /// The transformed point. No division by w; the result has the argument's w.
+    [[nodiscard]] FbxVector4 MultT(const FbxVector4& pVector) const;
+    /// The Euler angles of this rotation applied after the given one.
+    [[nodiscard]] FbxVector4 MultR(const FbxVector4& pVector) const;
+    /// The scale applied to a scale, component by component.
+    [[nodiscard]] FbxVector4 MultS(const FbxVector4& pVector) const;
+
+    /// The full product of all sixteen elements; the right matrix acts first.
+    FbxAMatrix operator*(const FbxAMatrix& pOther) const;
+    FbxAMatrix& operator*=(const FbxAMatrix& pOther) { return *this = *this * pOther; }
+
+    // Scalars act on all sixteen elements.
+    FbxAMatrix operator*(double pValue) const;
+    FbxAMatrix operator/(double pValue) const;
+    FbxAMatrix operator-() const { return *this * -1.0; }
+    FbxAMatrix& operator*=(double pValue) { return *this = *this * pValue; }
+    FbxAMatrix& operator/=(double pValue) { return *this = *this / pValue; }
+
+    /// The inverse of the affine part; the identity when there is none.
+    [[nodiscard]] FbxAMatrix Inverse() const;
+    [[nodiscard]] FbxAMatrix Transpose() const;
+    /// Rotation on the shorter way at constant speed, translation and scale in a straight line.
+    [[nodiscard]] FbxAMatrix Slerp(const FbxAMatrix& pOther, double pWeight) const;
+
+    /// Equal when no element differs by more than FBXSDK_TOLERANCE.
+    bool operator==(const FbxAMatrix& pOther) const;
+    bool operator!=(const FbxAMatrix& pOther) const { return !(*this == pOther); }
+    [[nodiscard]] bool IsIdentity(const double pThreshold = FBXSDK_TOLERANCE) const;
+
+    operator double*() { return mData[0].mData; }
+    operator const double*() const { return mData[0].mData; }
+    using FbxDouble4x4::operator[];
+};
+
+static_assert(sizeof(FbxAMatrix) == 16 * sizeof(double), "hosts work on the raw sixteen doubles");
+
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,94 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A growing array with the API's `int` indices.
+#pragma once
+
+#include <algorithm>
+#include <cassert>
+#include <cstddef>
+#include <type_traits>
+#include <vector>
+
+#include <fbxsdk/FbxArch.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+template <typename T>
+class FbxArray {
+    static_assert(!std::is_same<T, bool>::value, "elements are handed out by reference; packed bits cannot be");
+
+public:
+    FbxArray() = default;
+    /// Room for that many elements; the array is empty.
+    explicit FbxArray(int pCapacity) { Reserve(pCapacity); }
+
+    [[nodiscard]] int GetCount() const { return static_cast<int>(mItems.size()); }
+    [[nodiscard]] int Size() const { return GetCount(); }
+
+    T& operator[](int pIndex) { return mItems[checked(pIndex)]; }
+    const T& operator[](int pIndex) const { return mItems[checked(pIndex)]; }
+    [[nodiscard]] T GetAt(int pIndex) const { return mItems[checked(pIndex)]; }
+    void SetAt(int pIndex, const T& pElement) { mItems[checked(pIndex)] = pElement; }
+    [[nodiscard]] T GetFirst() const { return GetAt(0); }
+    [[nodiscard]] T GetLast() const { return GetAt(GetCount() - 1); }
+    [[nodiscard]] T* GetArray() { return mItems.data(); }
+    [[nodiscard]] const T* GetArray() const { return mItems.data(); }
+
+    /// The index of the first equal element at or after the start; -1 when there is none.
+    [[nodiscard]] int Find(const T& pElement, int pStartIndex = 0) const {
+        if (pStartIndex < 0 || pStartIndex >= GetCount()) {
+            return -1;
+        }
+        const auto found = std::find(mItems.begin() + pStartIndex, mItems.end(), pElement);
+        return found == mItems.end() ? -1 : static_cast<int>(found - mItems.begin());
+    }
+
+    /// Appends; the result is the new element's index.
+    int Add(const T& pElement) {
+        mItems.push_back(pElement);
+        return GetCount() - 1;
+    }
+    int AddUnique(const T& pElement) {
+        const int found = Find(pElement);
+        return found >= 0 ? found : Add(pElement);
+    }
+    /// An index beyond the end appends; a negative one does nothing and gives -1.
+    int InsertAt(int pIndex, const T& pElement) {
+        if (pIndex < 0) {
+            return -1;
+        }
+        const int index = std::min(pIndex, GetCount());
+        mItems.insert(mItems.begin() + index, pElement);
+        return index;
+    }
+    T RemoveAt(int pIndex) {
+        const T removed = GetAt(pIndex);
+        mItems.erase(mItems.begin() + pIndex);
+        return removed;
+    }
+    T RemoveLast() { return RemoveAt(GetCount() - 1); }
+
+    void Reserve(int pCapacity) { mItems.reserve(static_cast<size_t>(std::max(pCapacity, 0))); }
+    /// New elements are value-initialised.
+    void Resize(int pCount) { mItems.resize(static_cast<size_t>(std::max(pCount, 0))); }
+    void Clear() { mItems.clear(); }
+
+    [[nodiscard]] auto begin() { return mItems.begin(); }
+    [[nodiscard]] auto end() { return mItems.end(); }
+    [[nodiscard]] auto begin() const { return mItems.begin(); }
+    [[nodiscard]] auto end() const { return mItems.end(); }
+
+    bool operator==(const FbxArray& pOther) const { return mItems == pOther.mItems; }
+    bool operator!=(const FbxArray& pOther) const { return !(*this == pOther); }
+
+private:
+    [[nodiscard]] size_t checked(int pIndex) const {
+        assert(pIndex >= 0 && pIndex < GetCount());
+        return static_cast<size_t>(pIndex);
+    }
+
+    std::vector<T> mItems;
+};
+
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,41 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A colour of four doubles; 0 to 1 is the displayable range, but nothing is clamped.
+#pragma once
+
+#include <fbxsdk/FbxTypes.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+class FBXSDK_DLL FbxColor {
+public:
+    constexpr FbxColor() = default;
+    constexpr FbxColor(const double pRed, const double pGreen, const double pBlue, const double pAlpha = 1.0)
+        : mRed(pRed), mGreen(pGreen), mBlue(pBlue), mAlpha(pAlpha) {}
+    constexpr FbxColor(const FbxDouble3& pRGB, const double pAlpha = 1.0)
+        : FbxColor(pRGB[0], pRGB[1], pRGB[2], pAlpha) {}
+    constexpr FbxColor(const FbxDouble4& pRGBA) : FbxColor(pRGBA[0], pRGBA[1], pRGBA[2], pRGBA[3]) {}
+
+    void Set(const double pRed, const double pGreen, const double pBlue, const double pAlpha = 1.0) {
+        *this = FbxColor(pRed, pGreen, pBlue, pAlpha);
+    }
+    /// Whether all four components lie in 0 to 1.
+    [[nodiscard]] bool IsValid() const;
+
+    /// 0 red, 1 green, 2 blue, anything else alpha.
+    double& operator[](int pIndex);
+    const double& operator[](int pIndex) const;
+
+    bool operator==(const FbxColor& pColor) const {
+        return mRed == pColor.mRed && mGreen == pColor.mGreen && mBlue == pColor.mBlue && mAlpha == pColor.mAlpha;
+    }
+    bool operator!=(const FbxColor& pColor) const { return !(*this == pColor); }
+
+    double mRed = 0.0;
+    double mGreen = 0.0;
+    double mBlue = 0.0;
+    double mAlpha = 1.0;
+};
+
+FBXSDK_NAMESPACE_END

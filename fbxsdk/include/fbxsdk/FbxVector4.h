@@ -1,0 +1,75 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A vector of four doubles: a point, direction, set of Euler angles (degrees) or scale with a w that mostly stays 1.
+#pragma once
+
+#include <fbxsdk/FbxTypes.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+/// Arithmetic works on all four components; lengths and products with a geometric meaning on x, y, z.
+class FBXSDK_DLL FbxVector4 : public FbxDouble4 {
+public:
+    constexpr FbxVector4() : FbxDouble4(0.0, 0.0, 0.0, 1.0) {}
+    constexpr FbxVector4(const double pX, const double pY, const double pZ, const double pW = 1.0)
+        : FbxDouble4(pX, pY, pZ, pW) {}
+    constexpr FbxVector4(const double pValue[4]) : FbxDouble4(pValue[0], pValue[1], pValue[2], pValue[3]) {}
+    constexpr FbxVector4(const FbxDouble3& pValue) : FbxDouble4(pValue[0], pValue[1], pValue[2], 1.0) {}
+    constexpr FbxVector4(const FbxDouble4& pValue) : FbxDouble4(pValue) {}
+
+    void Set(const double pX, const double pY, const double pZ, const double pW = 1.0) {
+        *this = FbxVector4(pX, pY, pZ, pW);
+    }
+
+    using FbxDouble4::operator[];
+    operator double*() { return mData; }
+    operator const double*() const { return mData; }
+
+    bool operator==(const FbxVector4& pVector) const { return FbxDouble4::operator==(pVector); }
+    bool operator!=(const FbxVector4& pVector) const { return !(*this == pVector); }
+
+    FbxVector4 operator-() const { return {-mData[0], -mData[1], -mData[2], -mData[3]}; }
+    FbxVector4 operator+(double pValue) const { return *this + FbxVector4(pValue, pValue, pValue, pValue); }
+    FbxVector4 operator-(double pValue) const { return *this - FbxVector4(pValue, pValue, pValue, pValue); }
+    FbxVector4 operator*(double pValue) const { return *this * FbxVector4(pValue, pValue, pValue, pValue); }
+    FbxVector4 operator/(double pValue) const { return *this / FbxVector4(pValue, pValue, pValue, pValue); }
+    FbxVector4 operator+(const FbxVector4& pVector) const {
+        return {mData[0] + pVector.mData[0], mData[1] + pVector.mData[1], mData[2] + pVector.mData[2],
+                mData[3] + pVector.mData[3]};
+    }
+    FbxVector4 operator-(const FbxVector4& pVector) const {
+        return {mData[0] - pVector.mData[0], mData[1] - pVector.mData[1], mData[2] - pVector.mData[2],
+                mData[3] - pVector.mData[3]};
+    }
+    FbxVector4 operator*(const FbxVector4& pVector) const {
+        return {mData[0] * pVector.mData[0], mData[1] * pVector.mData[1], mData[2] * pVector.mData[2],
+                mData[3] * pVector.mData[3]};
+    }
+    FbxVector4 operator/(const FbxVector4& pVector) const {
+        return {mData[0] / pVector.mData[0], mData[1] / pVector.mData[1], mData[2] / pVector.mData[2],
+                mData[3] / pVector.mData[3]};
+    }
+    FbxVector4& operator+=(double pValue) { return *this = *this + pValue; }
+    FbxVector4& operator-=(double pValue) { return *this = *this - pValue; }
+    FbxVector4& operator*=(double pValue) { return *this = *this * pValue; }
+    FbxVector4& operator/=(double pValue) { return *this = *this / pValue; }
+    FbxVector4& operator+=(const FbxVector4& pVector) { return *this = *this + pVector; }
+    FbxVector4& operator-=(const FbxVector4& pVector) { return *this = *this - pVector; }
+    FbxVector4& operator*=(const FbxVector4& pVector) { return *this = *this * pVector; }
+    FbxVector4& operator/=(const FbxVector4& pVector) { return *this = *this / pVector; }
+
+    [[nodiscard]] double DotProduct(const FbxVector4& pVector) const {
+        return mData[0] * pVector.mData[0] + mData[1] * pVector.mData[1] + mData[2] * pVector.mData[2];
+    }
+    [[nodiscard]] FbxVector4 CrossProduct(const FbxVector4& pVector) const;
+    [[nodiscard]] double SquareLength() const { return DotProduct(*this); }
+    [[nodiscard]] double Length() const;
+    [[nodiscard]] double Distance(const FbxVector4& pVector) const;
+    /// x, y, z to length 1, w untouched; a vector of length 0 stays as it is.
+    void Normalize();
+};
+
+inline FbxVector4 operator*(double pValue, const FbxVector4& pVector) { return pVector * pValue; }
+
+FBXSDK_NAMESPACE_END

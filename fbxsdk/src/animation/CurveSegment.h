@@ -1,0 +1,36 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What tangents and evaluation both ask about the piece of a curve between two keys.
+#pragma once
+
+#include <fbxsdk/FbxTime.h>
+
+#include "animation/CurveEvaluation.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// A segment is interpolated as its left key says. Flags that say nothing mean constant.
+enum class Interpolation { constant, constantNext, linear, cubic };
+
+[[nodiscard]] Interpolation interpolationOf(const CurveKeys& keys, std::size_t key);
+
+/// With this weight on both sides a weighted cubic is the plain Hermite one.
+constexpr double kEqualWeight = 1.0 / 3.0;
+
+/// The lengths of a key's handles as parts of their segments, within 0.0001 to 0.99; a third when not weighted.
+[[nodiscard]] double rightWeight(const CurveKeys& keys, std::size_t key);
+[[nodiscard]] double leftWeight(const CurveKeys& keys, std::size_t key);
+
+/// Ticks from one time to a later one; in 64 bits for any two times.
+[[nodiscard]] inline std::uint64_t ticksBetween(std::int64_t from, std::int64_t to) {
+    return static_cast<std::uint64_t>(to) - static_cast<std::uint64_t>(from);
+}
+
+[[nodiscard]] inline double secondsBetween(std::int64_t from, std::int64_t to) {
+    return to > from ? static_cast<double>(ticksBetween(from, to)) / static_cast<double>(FBXSDK_TC_SECOND) : 0.0;
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,387 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// ASCII files:
+//
+//     file   := { record }
+//     record := name ':' [ value { ',' value } ] [ '{' { record } '}' ]
+//     value  := text | number | word | '*' count '{' 'a' ':' number { ',' number } '}'
+//
+// Blanks, line ends and comments (from ';' to the end of the line) may stand between any two tokens, and a comma too
+// many means nothing. So the values of a record end where a token follows that is a brace or has a colon behind it.
+#include "container/AsciiReader.h"
+
+#include <algorithm>
+#include <cstring>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "container/AsciiPreamble.h"
+#include "container/NumberRun.h"
+#include "container/NumberText.h"
+#include "container/ReadLimits.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+namespace {
+
+/// From this version on, whole numbers in KeyAttrDataFloat are the bits of floats.
+constexpr std::uint32_t kFirstBitPatternVersion = 7200;
+
+struct Entity {
+    std::string_view spelling;
+    char character;
+};
+constexpr Entity kEntities[] = {{"&quot;", '"'}, {"&lf;", '\n'}, {"&cr;", '\r'}};
+
+/// Nothing else is an entity: "&amp;" and a lone "&" stand for themselves.
+std::string decodeEntities(std::string_view text) {
+    std::string decoded;
+    decoded.reserve(text.size());
+    while (!text.empty()) {
+        const auto* const entity = std::find_if(std::begin(kEntities), std::end(kEntities),
+                                                [&](const Entity& row) { return text.starts_with(row.spelling); });
+        if (entity != std::end(kEntities)) {
+            decoded += entity->character;
+            text.remove_prefix(entity->spelling.size());
+        } else {
+            // The next entity starts at an ampersand, if there is one.
+            const std::size_t plain = std::min(text.find('&', 1), text.size());
+            decoded += text.substr(0, plain);
+            text.remove_prefix(plain);
+        }
+    }
+    return decoded;
+}
+
+/// The first such byte, or the end. Texts may be megabytes of encoded pictures.
+const char* findByte(const char* text, const char* end, char byte) {
+    const void* const found = std::memchr(text, byte, static_cast<std::size_t>(end - text));
+    return found != nullptr ? static_cast<const char*>(found) : end;
+}
+
+std::uint64_t countNewlines(const char* text, const char* end) {
+    std::uint64_t count = 0;
+    // Lines are long where files are large, so that searching beats counting byte by byte.
+    while ((text = findByte(text, end, '\n')) != end) {
+        ++count;
+        ++text;
+    }
+    return count;
+}
+
+/// A record whose block is being read.
+struct OpenBlock {
+    Record* record = nullptr;
+    Record* lastChild = nullptr;
+};
+
+class AsciiReader {
+public:
+    AsciiReader(std::span<const char> bytes, RecordTree& tree, FbxStatus& status)
+        : mStart(bytes.data()), mEnd(bytes.data() + bytes.size()), mNext(mStart), mCounted(mStart), mTree(tree),
+          mStatus(status) {}
+
+    bool read() { return readVersion() && readRecords(); }
+
+private:
+    bool fail(const char* place, const std::string& what, FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
+        const std::string line = std::to_string(1 + countNewlines(mStart, place));
+        mStatus.SetCode(code, "%s: line %s: %s", mTree.fileName.c_str(), line.c_str(), what.c_str());
+        return false;
+    }
+    bool failUnexpected(const char* place, const std::string& expected);
+
+    [[nodiscard]] bool nextIs(char c) const { return mNext != mEnd && *mNext == c; }
+    [[nodiscard]] bool nextIsName() const;
+    std::uint64_t countLines(const char* place);
+    std::string_view readToken();
+    bool readQuoted(std::string_view& text);
+
+    bool readVersion();
+    bool readRecords();
+    bool readRecord();
+    bool openBlock(Record& record);
+    Record& appendRecord(std::string_view name);
+    void noteVersion(const Record& record);
+
+    bool readValues(Record& record);
+    bool readNumberList(Record& record);
+    bool readValue(const Record& record, Value& value);
+    bool readBareValue(Value& value);
+    bool readArray(const Record& record, Value& value);
+    StoredArray& keepArray(const char* start, const NumberRun& run);
+    void keepValues(Record& record);
+
+    const char* mStart;
+    const char* mEnd;
+    const char* mNext;
+    const char* mCounted; ///< up to where lines are counted
+    std::uint64_t mLine = 1;
+    RecordTree& mTree;
+    FbxStatus& mStatus;
+    std::uint32_t mArrayVersion = 0; ///< how arrays are to be understood
+    std::vector<OpenBlock> mOpen;
+    std::vector<Value> mValues; ///< of the current record
+};
+
+bool AsciiReader::failUnexpected(const char* place, const std::string& expected) {
+    if (place == mEnd) {
+        return fail(place, "the file ends where " + expected + " should follow");
+    }
+    constexpr std::ptrdiff_t kShown = 40;
+    const char* const end = std::max(tokenEnd(place, mEnd), place + 1);
+    const std::string token(place, std::min(end, place + kShown));
+    return fail(place, "expected " + expected + " instead of '" + token + "'");
+}
+
+/// Whether a name and its colon come next: the start of a record, where otherwise a value might stand.
+bool AsciiReader::nextIsName() const {
+    const char* after = tokenEnd(mNext, mEnd);
+    if (nextIs('"')) {
+        after = findByte(mNext + 1, mEnd, '"');
+        if (after == mEnd) {
+            return false;
+        }
+        ++after;
+    }
+    const char* const colon = skipBlanks(after, mEnd);
+    return after != mNext && colon != mEnd && *colon == ':';
+}
+
+std::uint64_t AsciiReader::countLines(const char* place) {
+    mLine += countNewlines(mCounted, place);
+    mCounted = place;
+    return mLine;
+}
+
+std::string_view AsciiReader::readToken() {
+    const char* const start = mNext;
+    mNext = tokenEnd(start, mEnd);
+    return {start, static_cast<std::size_t>(mNext - start)};
+}
+
+bool AsciiReader::readQuoted(std::string_view& text) {
+    const char* const start = mNext + 1;
+    const char* const quote = findByte(start, mEnd, '"');
+    if (quote == mEnd) {
+        return fail(mNext, "a text has no closing quote");
+    }
+    text = {start, static_cast<std::size_t>(quote - start)};
+    if (text.find('&') != std::string_view::npos) {
+        text = mTree.keepText(decodeEntities(text));
+    }
+    mNext = quote + 1;
+    return true;
+}
+
+bool AsciiReader::readVersion() {
+    const AsciiPreamble preamble = readPreamble({mStart, mEnd});
+    mNext = preamble.end;
+    mTree.version = mArrayVersion = preamble.version;
+    if (preamble.version != 0 && !isSupportedVersion(preamble.version)) {
+        return fail(preamble.versionComment, "unsupported version " + std::to_string(preamble.version),
+                    FbxStatus::eInvalidFileVersion);
+    }
+    return true;
+}
+
+bool AsciiReader::readRecords() {
+    mOpen.push_back({&mTree.root, nullptr});
+    while (true) {
+        mNext = skipSeparators(mNext, mEnd);
+        if (mNext == mEnd) {
+            const Record& open = *mOpen.back().record;
+            return mOpen.size() == 1 || fail(mEnd, "the file ends within the block of '" + std::string(open.name) +
+                                                       "' from line " + std::to_string(open.location));
+        }
+        if (nextIs('}') && mOpen.size() > 1) {
+            mOpen.pop_back();
+            ++mNext;
+        } else if (!readRecord()) {
+            return false;
+        }
+    }
+}
+
+Record& AsciiReader::appendRecord(std::string_view name) {
+    OpenBlock& block = mOpen.back();
+    Record& record = mTree.newRecord(name);
+    (block.lastChild != nullptr ? block.lastChild->nextSibling : block.record->firstChild) = &record;
+    block.lastChild = &record;
+    return record;
+}
+
+bool AsciiReader::readRecord() {
+    if (!nextIsName()) {
+        return failUnexpected(mNext, "a name with a colon");
+    }
+    const std::uint64_t line = countLines(mNext);
+    std::string_view name;
+    if (!nextIs('"')) {
+        name = readToken();
+    } else if (!readQuoted(name)) {
+        return false;
+    }
+    Record& record = appendRecord(name);
+    record.location = line;
+    mNext = skipBlanks(mNext, mEnd) + 1; // the colon
+    if (!readValues(record)) {
+        return false;
+    }
+    noteVersion(record);
+    mNext = skipBlanks(mNext, mEnd);
+    return !nextIs('{') || openBlock(record);
+}
+
+bool AsciiReader::openBlock(Record& record) {
+    if (mOpen.size() > kMaxDepth) {
+        return fail(mNext, "records are nested deeper than " + std::to_string(kMaxDepth) + " levels");
+    }
+    record.hasBlock = true;
+    mOpen.push_back({&record, nullptr});
+    ++mNext;
+    return true;
+}
+
+/// The tree's version stays what the comment says; how to read arrays has to be known before the document is.
+void AsciiReader::noteVersion(const Record& record) {
+    if (mTree.version == 0 && record.name == "FBXVersion" && mOpen.back().record->name == "FBXHeaderExtension") {
+        mArrayVersion =
+            static_cast<std::uint32_t>(std::clamp<std::int64_t>(record.value(0).toInteger(), 0, kFirstUnknownVersion));
+    }
+}
+
+bool AsciiReader::readValues(Record& record) {
+    mNext = skipSeparators(mNext, mEnd);
+    if (readNumberList(record)) {
+        return true;
+    }
+    mValues.clear();
+    while (mNext != mEnd && !nextIs('{') && !nextIs('}') && !nextIsName()) {
+        Value value;
+        if (!readValue(record, value)) {
+            return false;
+        }
+        mValues.push_back(value);
+        mNext = skipBlanks(mNext, mEnd);
+        if (!nextIs(',')) {
+            break;
+        }
+        mNext = skipSeparators(mNext, mEnd);
+    }
+    keepValues(record);
+    return true;
+}
+
+/// Takes the values as one array if they are many and nothing but numbers. Otherwise leaves them to be read singly.
+bool AsciiReader::readNumberList(Record& record) {
+    const char* const start = mNext;
+    const NumberRun run = scanNumbers(start, mEnd, /*wordsCount*/ false);
+    if (run.count < kShortestList) {
+        return false;
+    }
+    mNext = run.next;
+    if (run.afterComma && mNext != mEnd && !nextIs('{') && !nextIs('}') && !nextIsName()) {
+        mNext = start;
+        return false;
+    }
+    mValues.assign(1, Value::ofArray(keepArray(start, run)));
+    keepValues(record);
+    return true;
+}
+
+bool AsciiReader::readValue(const Record& record, Value& value) {
+    if (nextIs('*')) {
+        return readArray(record, value);
+    }
+    if (!nextIs('"')) {
+        return readBareValue(value);
+    }
+    std::string_view text;
+    if (!readQuoted(text)) {
+        return false;
+    }
+    value = Value::ofText(text);
+    return true;
+}
+
+bool AsciiReader::readBareValue(Value& value) {
+    const char* const start = mNext;
+    const std::string_view token = readToken();
+    if (token.empty()) {
+        return failUnexpected(start, "a value");
+    }
+    if (const std::optional<std::int64_t> integer = parseInteger(token)) {
+        value = Value::ofInteger(*integer);
+        return true;
+    }
+    if (const std::optional<double> real = parseReal(token)) {
+        value = Value::ofReal(*real);
+        return true;
+    }
+    if (chars::is(chars::digit, token.front()) || std::string_view("+-.").find(token.front()) != token.npos) {
+        return failUnexpected(start, "a number");
+    }
+    // A word behind a text is a name that lost its quotes; nobody knows where it should have ended.
+    if (token.size() > 1 && !mValues.empty() && mValues.back().type == Value::Type::text) {
+        return failUnexpected(start, "a quoted text");
+    }
+    value = Value::ofWord(token);
+    return true;
+}
+
+/// The count behind the asterisk is not to be trusted, nor needed.
+bool AsciiReader::readArray(const Record& record, Value& value) {
+    ++mNext;
+    const std::string_view count = readToken();
+    mNext = skipBlanks(mNext, mEnd);
+    if (count.empty() || skipDigits(count.data(), count.data() + count.size()) != count.data() + count.size() ||
+        !nextIs('{')) {
+        return failUnexpected(mNext, "a count and a brace");
+    }
+    mNext = skipBlanks(mNext + 1, mEnd);
+    if (!nextIs('}')) {
+        const char* const name = mNext;
+        if (!nextIsName() || readToken() != "a") {
+            return failUnexpected(name, "'a:'");
+        }
+        mNext = skipSeparators(skipBlanks(mNext, mEnd) + 1, mEnd);
+    }
+    const char* const start = mNext;
+    const NumberRun run = scanNumbers(start, mEnd, /*wordsCount*/ true);
+    mNext = run.next;
+    if (!nextIs('}')) {
+        return failUnexpected(mNext, "a number or '}'");
+    }
+    ++mNext;
+    StoredArray& array = keepArray(start, run);
+    array.bitPatterns = mArrayVersion >= kFirstBitPatternVersion && record.name == "KeyAttrDataFloat";
+    value = Value::ofArray(array);
+    return true;
+}
+
+StoredArray& AsciiReader::keepArray(const char* start, const NumberRun& run) {
+    StoredArray& array = mTree.newArray();
+    array.element = StoredArray::Element::text;
+    array.count = run.count;
+    array.bytes = {start, run.numbersEnd};
+    return array;
+}
+
+void AsciiReader::keepValues(Record& record) {
+    const std::span<Value> values = mTree.newValues(mValues.size());
+    std::copy(mValues.begin(), mValues.end(), values.begin());
+    record.values = values;
+}
+
+} // namespace
+
+bool readAscii(std::span<const char> bytes, RecordTree& tree, FbxStatus& status) {
+    return AsciiReader(bytes, tree, status).read();
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

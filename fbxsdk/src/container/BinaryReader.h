@@ -1,0 +1,21 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Binary files: a 27-byte header, then records whose sizes and ends stand before them.
+#pragma once
+
+#include <span>
+
+#include "container/Record.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// Whether the bytes begin like a binary file.
+[[nodiscard]] bool isBinary(std::span<const char> bytes);
+
+/// Cuts the bytes into the tree's records and fills in its version and byte order. False with a sentence in the status.
+[[nodiscard]] bool readBinary(std::span<const char> bytes, RecordTree& tree, FbxStatus& status);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,191 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Stored arrays become numbers: inflated, swapped, converted, or parsed from text.
+#include "container/NumberDecoding.h"
+
+#include <bit>
+#include <charconv>
+#include <cstring>
+#include <memory>
+#include <new>
+#include <type_traits>
+
+#include "container/ByteOrder.h"
+#include "container/NumberConversion.h"
+#include "container/NumberText.h"
+#include "container/ZlibStream.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+namespace {
+
+/// The bits of a float travel as bits, so that no NaN loses its payload.
+template <class Source, class Number>
+constexpr bool kSameBits = std::is_same_v<Source, Number> ||
+                           (std::is_same_v<Source, float> && std::is_same_v<Number, std::uint32_t>);
+
+/// Elements in the order of their addresses; the source may be the tail of the destination as long as it is not wider.
+template <class Source, class Number>
+void convertElements(const char* source, std::size_t stride, bool swap, std::span<Number> destination) {
+    if constexpr (kSameBits<Source, Number>) {
+        if (stride == sizeof(Source) && !swap) {
+            if (static_cast<const void*>(source) != destination.data()) {
+                std::memcpy(destination.data(), source, destination.size_bytes());
+            }
+            return;
+        }
+        for (Number& number : destination) {
+            number = loadNumber<Number>(source, swap);
+            source += stride;
+        }
+    } else {
+        for (Number& number : destination) {
+            number = convertNumber<Number>(loadNumber<Source>(source, swap));
+            source += stride;
+        }
+    }
+}
+
+template <class Number>
+void convertBytes(const StoredArray& array, const char* source, std::span<Number> destination) {
+    const bool swap = needsSwap(array.bigEndian);
+    const std::size_t stride = array.stride != 0 ? array.stride : elementSize(array.element);
+    switch (array.element) {
+    case StoredArray::Element::int8:
+        return convertElements<std::uint8_t>(source, stride, swap, destination);
+    case StoredArray::Element::int32:
+        return convertElements<std::int32_t>(source, stride, swap, destination);
+    case StoredArray::Element::int64:
+        return convertElements<std::int64_t>(source, stride, swap, destination);
+    case StoredArray::Element::float32:
+        return convertElements<float>(source, stride, swap, destination);
+    case StoredArray::Element::float64:
+        return convertElements<double>(source, stride, swap, destination);
+    case StoredArray::Element::text:
+        return; // never holds bytes
+    }
+}
+
+template <class Number>
+bool inflateArray(const StoredArray& array, std::span<Number> destination) {
+    const std::size_t size = static_cast<std::size_t>(array.count) * elementSize(array.element);
+    if (destination.size() == array.count && size <= destination.size_bytes()) {
+        // The tail of the destination serves as the buffer: widening from front to back never overtakes what it reads.
+        char* const tail = static_cast<char*>(static_cast<void*>(destination.data())) + destination.size_bytes() - size;
+        if (!inflateExactly(array.bytes, {tail, size})) {
+            return false;
+        }
+        convertBytes(array, tail, destination);
+        return true;
+    }
+    const std::unique_ptr<char[]> buffer(new (std::nothrow) char[size]);
+    if (!buffer || !inflateExactly(array.bytes, {buffer.get(), size})) {
+        return false;
+    }
+    convertBytes(array, buffer.get(), destination);
+    return true;
+}
+
+bool isWhole(const char* token, const char* end) {
+    return skipDigits(token + (*token == '-' || *token == '+' ? 1 : 0), end) == end;
+}
+
+/// A token that is no number stands for the code of its first letter, as one-letter codes do everywhere.
+double letterCode(char letter) { return static_cast<unsigned char>(letter); }
+
+template <class Number>
+Number parseElement(const char* token, const char* end, bool bitPatterns) {
+    const std::string_view text(token, static_cast<std::size_t>(end - token));
+    if (bitPatterns && isWhole(token, end)) {
+        const auto bits = static_cast<std::uint32_t>(parseInteger(text).value_or(0));
+        if constexpr (std::is_same_v<Number, std::uint32_t>) {
+            return bits;
+        } else {
+            return convertNumber<Number>(std::bit_cast<float>(bits));
+        }
+    }
+    if constexpr (std::is_same_v<Number, float> || std::is_same_v<Number, std::uint32_t>) {
+        // Not by way of a double: the nearest float of the nearest double may be the wrong one.
+        if (const std::optional<float> number = parseFloat(text)) {
+            return convertNumber<Number>(*number);
+        }
+    } else if constexpr (std::is_integral_v<Number>) {
+        if (const std::optional<std::int64_t> number = parseInteger(text)) {
+            return convertNumber<Number>(*number);
+        }
+    }
+    return convertNumber<Number>(parseReal(text).value_or(letterCode(*token)));
+}
+
+/// The common case, a number that std::from_chars takes as it stands, in one pass; everything else token by token.
+template <class Number>
+const char* parseFast(const char* text, const char* end, Number& number) {
+    if constexpr (!std::is_same_v<Number, std::uint32_t>) {
+        const auto result = std::from_chars(text, end, number);
+        if (result.ec == std::errc() && (result.ptr == end || chars::is(chars::delimiter, *result.ptr))) {
+            return result.ptr;
+        }
+    }
+    return nullptr;
+}
+
+template <class Number>
+bool parseText(const StoredArray& array, std::span<Number> destination) {
+    const char* text = array.bytes.data();
+    const char* const end = text + array.bytes.size();
+    for (Number& number : destination) {
+        const char* next = array.bitPatterns ? nullptr : parseFast(text, end, number);
+        if (next == nullptr) {
+            next = tokenEnd(text, end);
+            if (next == text) {
+                return false;
+            }
+            number = parseElement<Number>(text, next, array.bitPatterns);
+        }
+        text = skipSeparators(next, end);
+    }
+    return true;
+}
+
+} // namespace
+
+std::size_t elementSize(StoredArray::Element element) {
+    switch (element) {
+    case StoredArray::Element::int8:
+    case StoredArray::Element::text:
+        return 1;
+    case StoredArray::Element::int32:
+    case StoredArray::Element::float32:
+        return 4;
+    case StoredArray::Element::int64:
+    case StoredArray::Element::float64:
+        return 8;
+    }
+    return 1;
+}
+
+template <class Number>
+bool decodeArray(const StoredArray& array, std::span<Number> destination) {
+    if (destination.empty()) {
+        return true;
+    }
+    if (array.element == StoredArray::Element::text) {
+        return parseText(array, destination);
+    }
+    if (array.compressed) {
+        return inflateArray(array, destination);
+    }
+    convertBytes(array, array.bytes.data(), destination);
+    return true;
+}
+
+template bool decodeArray(const StoredArray&, std::span<double>);
+template bool decodeArray(const StoredArray&, std::span<float>);
+template bool decodeArray(const StoredArray&, std::span<std::int32_t>);
+template bool decodeArray(const StoredArray&, std::span<std::int64_t>);
+template bool decodeArray(const StoredArray&, std::span<std::uint32_t>);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,33 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Stored arrays become numbers here, at the moment somebody asks for them.
+#pragma once
+
+#include <cstdint>
+#include <span>
+
+#include "container/Record.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// Bytes of one element; 1 for `text`.
+[[nodiscard]] std::size_t elementSize(StoredArray::Element element);
+
+/// Decodes the first destination.size() elements, which the array must have.
+///
+/// An array is inflated straight into the destination, and widened or swapped there; only narrowing and partial reads
+/// go through a temporary of the array's size. False when the array is corrupt; the destination is then undefined.
+/// std::uint32_t asks for the bits of 32-bit floats.
+template <class Number>
+[[nodiscard]] bool decodeArray(const StoredArray& array, std::span<Number> destination);
+
+extern template bool decodeArray(const StoredArray&, std::span<double>);
+extern template bool decodeArray(const StoredArray&, std::span<float>);
+extern template bool decodeArray(const StoredArray&, std::span<std::int32_t>);
+extern template bool decodeArray(const StoredArray&, std::span<std::int64_t>);
+extern template bool decodeArray(const StoredArray&, std::span<std::uint32_t>);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

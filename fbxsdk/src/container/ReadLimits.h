@@ -1,0 +1,30 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What both readers accept at most.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+
+#include <fbxsdk/FbxArch.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+inline constexpr std::uint32_t kOldestVersion = 3000;
+inline constexpr std::uint32_t kFirstUnknownVersion = 8000;
+
+[[nodiscard]] constexpr bool isSupportedVersion(std::uint32_t version) {
+    return version >= kOldestVersion && version < kFirstUnknownVersion;
+}
+
+/// Levels of records. Sound files need less than twelve; one with fifty nested channels is known.
+inline constexpr std::size_t kMaxDepth = 64;
+
+/// From so many numbers on, a list of scalars is kept as one array instead of a value each: longer than any tuple or
+/// matrix, shorter than anything that is worth the bytes.
+inline constexpr std::size_t kShortestList = 17;
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,160 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The record tree that both containers, binary and ASCII, are cut into. After this stage nobody knows which one a file
+// was. Records and values point into the mapped file (or into the tree's own text store), so a tree lives exactly as
+// long as its RecordTree.
+#pragma once
+
+#include <cstdint>
+#include <deque>
+#include <memory>
+#include <memory_resource>
+#include <span>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include <fbxsdk/FbxArch.h>
+#include <fbxsdk/FbxStatus.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// A numeric array as the file stores it; decoded by readNumbers only when somebody asks.
+struct StoredArray {
+    /// int8 holds booleans and bytes and counts from 0 to 255.
+    enum class Element : std::uint8_t { int8, int32, int64, float32, float64, text };
+    Element element = Element::float64;
+    bool compressed = false;  ///< one zlib stream of the raw elements
+    bool bigEndian = false;   ///< byte order of the raw elements
+    bool bitPatterns = false; ///< ASCII: whole numbers that stand for the bits of 32-bit floats
+    std::uint8_t stride = 0;  ///< bytes from one element to the next; 0 when they are packed
+    std::uint64_t count =
+        0; ///< elements; already checked against the bytes (deflate cannot expand further than 1032:1)
+    std::span<const char> bytes; ///< the payload in the file; for `text` the source text of the list
+};
+
+/// One value of a record. Whole numbers and reals convert into each other; text never converts into a number.
+struct Value {
+    enum class Type : std::uint8_t { none, integer, real, text, raw, word, array };
+    Type type = Type::none;
+    union {
+        std::int64_t integer = 0;
+        double real;
+        const StoredArray* array;
+    };
+    std::string_view text; ///< of text (entities decoded, UTF-8 as stored), raw (bytes) and word (bare word or letter)
+
+    static Value ofInteger(std::int64_t number);
+    static Value ofReal(double number);
+    static Value ofText(std::string_view text);
+    static Value ofWord(std::string_view word);
+    static Value ofArray(const StoredArray& array);
+
+    [[nodiscard]] bool isNumber() const { return type == Type::integer || type == Type::real; }
+    /// Reals are truncated toward zero and saturate; NaN gives 0; a one-byte word gives its character code.
+    [[nodiscard]] std::int64_t toInteger(std::int64_t fallback = 0) const;
+    [[nodiscard]] double toReal(double fallback = 0.0) const;
+    /// Text, raw or word; empty for anything else.
+    [[nodiscard]] std::string_view toText() const;
+    /// The letter of a one-letter code ('T', 'C'), whether the file stores it as a char, a word or a string; 0 if none.
+    [[nodiscard]] char toLetter() const;
+};
+
+/// One record: a name, values, and, when it has a block, records below it.
+///
+/// A long list of plain numbers, whether an array of a 7.x file or the scalar list of an older one, is a single value
+/// of type array.
+struct Record {
+    std::string_view name;
+    std::span<const Value> values;
+    const Record* firstChild = nullptr;
+    const Record* nextSibling = nullptr;
+    std::uint64_t location = 0; ///< byte offset in a binary file, line in an ASCII one
+    bool hasBlock = false;
+
+    class Iterator {
+    public:
+        explicit Iterator(const Record* record) : mRecord(record) {}
+        const Record& operator*() const { return *mRecord; }
+        const Record* operator->() const { return mRecord; }
+        Iterator& operator++() {
+            mRecord = mRecord->nextSibling;
+            return *this;
+        }
+        bool operator==(const Iterator&) const = default;
+
+    private:
+        const Record* mRecord;
+    };
+    struct Children {
+        const Record* first;
+        [[nodiscard]] Iterator begin() const { return Iterator(first); }
+        [[nodiscard]] Iterator end() const { return Iterator(nullptr); }
+    };
+
+    [[nodiscard]] Children children() const { return {firstChild}; }
+    /// The first record of that name below this one; null when there is none.
+    [[nodiscard]] const Record* child(std::string_view childName) const;
+    /// The value at an index, or a value of type none.
+    [[nodiscard]] const Value& value(std::size_t index) const;
+    /// The first value of the child of that name, or a value of type none.
+    [[nodiscard]] const Value& childValue(std::string_view childName) const;
+
+    /// How many numbers the record carries: the elements of its array, or its numeric scalars.
+    [[nodiscard]] std::size_t numberCount() const;
+    /// Decodes the first destination.size() numbers straight into the destination, converting where the stored type
+    /// differs (reals to whole numbers by truncation with saturation). False when a compressed array is corrupt or the
+    /// record has fewer numbers; the destination is then zero-filled.
+    [[nodiscard]] bool readNumbers(std::span<double> destination) const;
+    [[nodiscard]] bool readNumbers(std::span<float> destination) const;
+    [[nodiscard]] bool readNumbers(std::span<std::int32_t> destination) const;
+    [[nodiscard]] bool readNumbers(std::span<std::int64_t> destination) const;
+    /// The bits of 32-bit floats, exact for every container: binary floats, ASCII whole numbers, ASCII reals rounded to
+    /// the nearest float.
+    [[nodiscard]] bool readFloatBits(std::span<std::uint32_t> destination) const;
+};
+
+/// A mapped file and the records cut from it.
+class RecordTree {
+public:
+    RecordTree() = default;
+    RecordTree(const RecordTree&) = delete;
+    RecordTree& operator=(const RecordTree&) = delete;
+
+    /// The container's own version number: the header of a binary file, the first comment of an ASCII one; 0 when an
+    /// ASCII file states none.
+    std::uint32_t version = 0;
+    bool ascii = false;
+    bool bigEndian = false;
+    std::string fileName; ///< as given to readRecords, for messages
+    std::uint64_t fileSize = 0;
+    Record root; ///< without name and values; its children are the top-level records
+
+    /// "line" or "offset" and the number, for messages about a record.
+    [[nodiscard]] std::string placeOf(const Record& record) const;
+
+    // What readers (and the translation of old generations) build records with. Memory is released with the tree.
+    Record& newRecord(std::string_view name);
+    std::span<Value> newValues(std::size_t count);
+    StoredArray& newArray();
+    std::string_view keepText(std::string text);
+
+    std::shared_ptr<const void> mapping; ///< keeps the file's bytes alive
+
+private:
+    std::pmr::monotonic_buffer_resource mMemory{64 * 1024};
+    std::deque<std::string> mTexts;
+};
+
+/// Reads a file into a tree: maps it, detects the container by content, cuts it into records.
+///
+/// Null on failure; the status then says which file, where in it and what is wrong. Arrays are not decoded here.
+[[nodiscard]] std::unique_ptr<RecordTree> readRecords(const std::string& fileName, FbxStatus& status);
+/// The same for bytes in memory, which must outlive the tree. `fileName` is for messages only.
+[[nodiscard]] std::unique_ptr<RecordTree> readRecords(std::span<const char> bytes, const std::string& fileName,
+                                                      FbxStatus& status);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,187 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Connections: reading their records, and making the set of them sound: both ends exist, none is doubled, and the
+// Models form a tree below the root.
+#include <algorithm>
+#include <array>
+#include <numeric>
+#include <tuple>
+
+#include "document/DocumentBuilder.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+/// Where the ends stand in a connection record; -1 for a property that this kind of connection does not name.
+struct ConnectionLayout {
+    std::string_view type;
+    int source, sourceProperty, destination, destinationProperty;
+};
+constexpr ConnectionLayout kConnectionLayouts[] = {
+    {"OO", 1, -1, 2, -1},
+    {"OP", 1, -1, 2, 3},
+    {"PO", 1, 2, 3, -1},
+    {"PP", 1, 2, 3, 4},
+};
+
+/// Models of these names stay out of the node tree when nothing connects them to it: they are the application's views.
+constexpr std::pair<std::string_view, std::string_view> kViewModels[] = {
+    {"Camera", "Producer Perspective"}, {"Camera", "Producer Front"},          {"Camera", "Producer Back"},
+    {"Camera", "Producer Right"},       {"Camera", "Producer Left"},           {"Camera", "Producer Top"},
+    {"Camera", "Producer Bottom"},      {"CameraSwitcher", "Camera Switcher"},
+};
+
+bool isViewModel(const DocumentObject& object) {
+    return std::any_of(std::begin(kViewModels), std::end(kViewModels),
+                       [&](const auto& view) { return object.subClass == view.first && object.name == view.second; });
+}
+
+bool endsExist(const Document& document, const DocumentConnection& connection) {
+    return document.find(connection.source) && (connection.destination == 0 || document.find(connection.destination));
+}
+
+void dropImpossible(DocumentBuilder& builder) {
+    const Document& document = builder.document();
+    auto& connections = builder.document().connections;
+    const std::size_t toItself = std::erase_if(
+        connections, [](const DocumentConnection& connection) { return connection.source == connection.destination; });
+    const std::size_t unknown = std::erase_if(
+        connections, [&](const DocumentConnection& connection) { return !endsExist(document, connection); });
+    if (toItself != 0)
+        builder.warn(std::to_string(toItself) + " connections lead from an object to itself; they are left out.");
+    if (unknown != 0)
+        builder.warn(std::to_string(unknown) + " connections have an end that no object is; they are left out.");
+}
+
+void dropDoubled(std::vector<DocumentConnection>& connections) {
+    const auto key = [&](std::uint32_t index) {
+        const DocumentConnection& connection = connections[index];
+        return std::tie(connection.source, connection.destination, connection.destinationProperty,
+                        connection.sourceProperty);
+    };
+    std::vector<std::uint32_t> order(connections.size());
+    std::iota(order.begin(), order.end(), 0U);
+    std::sort(order.begin(), order.end(), [&](std::uint32_t a, std::uint32_t b) {
+        return std::tuple_cat(key(a), std::tie(a)) < std::tuple_cat(key(b), std::tie(b));
+    });
+    std::vector<bool> doubled(connections.size(), false);
+    for (std::size_t i = 1; i < order.size(); ++i)
+        doubled[order[i]] = key(order[i]) == key(order[i - 1]);
+    std::size_t position = 0;
+    std::erase_if(connections, [&](const DocumentConnection&) { return doubled[position++]; });
+}
+
+/// The parents of all Models, as indices: of the object the connection comes from, to the connection itself.
+class ModelTree {
+public:
+    explicit ModelTree(DocumentBuilder& builder)
+        : mBuilder(builder), mDocument(builder.document()), mParentEdge(mDocument.objects.size(), kNone) {}
+
+    void makeSound() {
+        keepFirstParents();
+        breakCycles();
+        attachOrphans();
+    }
+
+private:
+    static constexpr std::uint32_t kNone = ~0U;
+
+    [[nodiscard]] const DocumentObject* modelOf(std::int64_t id) const {
+        const DocumentObject* object = mDocument.find(id);
+        return object && object->record == "Model" ? object : nullptr;
+    }
+    [[nodiscard]] std::uint32_t indexOf(const DocumentObject& object) const {
+        return static_cast<std::uint32_t>(&object - mDocument.objects.data());
+    }
+
+    /// The Model that the connection gives a parent; null when it is not of that kind.
+    [[nodiscard]] const DocumentObject* childOf(const DocumentConnection& connection) const {
+        if (!connection.sourceProperty.empty() || !connection.destinationProperty.empty())
+            return nullptr;
+        const DocumentObject* child = modelOf(connection.source);
+        return child && (connection.destination == 0 || modelOf(connection.destination)) ? child : nullptr;
+    }
+
+    void keepFirstParents() {
+        auto& connections = mDocument.connections;
+        std::uint32_t kept = 0;
+        for (std::uint32_t i = 0; i < connections.size(); ++i) {
+            if (const DocumentObject* child = childOf(connections[i])) {
+                std::uint32_t& edge = mParentEdge[indexOf(*child)];
+                if (edge != kNone) {
+                    mBuilder.warn("The Model " + quotedName(child->name) +
+                                  " has more than one parent; only the first one counts.");
+                    continue;
+                }
+                edge = kept;
+            }
+            connections[kept++] = connections[i];
+        }
+        connections.resize(kept);
+    }
+
+    /// The index of the Model's parent; kNone below the root and without a parent.
+    [[nodiscard]] std::uint32_t parentOf(std::uint32_t model) const {
+        const std::uint32_t edge = mParentEdge[model];
+        if (edge == kNone || mDocument.connections[edge].destination == 0)
+            return kNone;
+        return indexOf(*mDocument.find(mDocument.connections[edge].destination));
+    }
+
+    /// Walks up from every Model once; whoever meets its own walk again closes a cycle.
+    void breakCycles() {
+        constexpr std::uint32_t kUnseen = 0;
+        std::vector<std::uint32_t> walkOf(mDocument.objects.size(), kUnseen);
+        std::uint32_t walk = kUnseen;
+        for (std::uint32_t start = 0; start < walkOf.size(); ++start) {
+            ++walk;
+            std::uint32_t model = start;
+            while (model != kNone && walkOf[model] == kUnseen) {
+                walkOf[model] = walk;
+                model = parentOf(model);
+            }
+            if (model == kNone || walkOf[model] != walk)
+                continue;
+            mDocument.connections[mParentEdge[model]].destination = 0;
+            mBuilder.warn("The Model " + quotedName(mDocument.objects[model].name) +
+                          " is its own ancestor; it becomes a child of the root.");
+        }
+    }
+
+    void attachOrphans() {
+        for (std::size_t i = 0; i < mDocument.objects.size(); ++i) {
+            const DocumentObject& object = mDocument.objects[i];
+            if (object.record == "Model" && mParentEdge[i] == kNone && !isViewModel(object))
+                mBuilder.connect(object.id, 0);
+        }
+    }
+
+    DocumentBuilder& mBuilder;
+    Document& mDocument;
+    std::vector<std::uint32_t> mParentEdge; ///< per object, the connection to its parent
+};
+
+} // namespace
+
+ConnectionEnds connectionEnds(const Record& record) {
+    const std::string_view type = record.value(0).toText();
+    const auto* layout = std::find_if(std::begin(kConnectionLayouts), std::end(kConnectionLayouts),
+                                      [&](const ConnectionLayout& row) { return row.type == type; });
+    if (layout == std::end(kConnectionLayouts))
+        return {};
+    const auto valueAt = [&](int position) -> const Value& { return record.value(static_cast<std::size_t>(position)); };
+    const auto textAt = [&](int position) { return position < 0 ? std::string_view() : valueAt(position).toText(); };
+    return {&valueAt(layout->source), &valueAt(layout->destination), textAt(layout->sourceProperty),
+            textAt(layout->destinationProperty)};
+}
+
+void cleanConnections(DocumentBuilder& builder) {
+    dropImpossible(builder);
+    dropDoubled(builder.document().connections);
+    ModelTree(builder).makeSound();
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

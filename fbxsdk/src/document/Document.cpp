@@ -1,0 +1,25 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Look-ups in a finished document.
+#include "document/Document.h"
+
+#include <algorithm>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+const DocumentProperty* DocumentObject::property(std::string_view propertyName) const {
+    const auto found = std::find_if(properties.rbegin(), properties.rend(),
+                                    [&](const DocumentProperty& property) { return property.name == propertyName; });
+    return found == properties.rend() ? nullptr : &*found;
+}
+
+const DocumentObject* Document::find(std::int64_t id) const {
+    const auto found = std::lower_bound(idIndex.begin(), idIndex.end(), id,
+                                        [](const auto& entry, std::int64_t wanted) { return entry.first < wanted; });
+    return found != idIndex.end() && found->first == id ? &objects[found->second] : nullptr;
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,130 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// One shape for files of every generation: objects with properties, and connections. Files of the 5.x and 6.x
+// generations are translated here, once, into what a 7.x file would have said; later stages never ask for a version.
+#pragma once
+
+#include <cstdint>
+#include <map>
+#include <memory>
+#include <span>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "container/Record.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// Ticks of one second in everything behind this stage, whatever unit the file counts in.
+inline constexpr std::int64_t kTicksPerSecond = 46186158000;
+
+/// One `P:` line (or what stands for it in an older file).
+struct DocumentProperty {
+    std::string_view name;
+    std::string_view typeName;     ///< "Lcl Translation", "double", "KString", …
+    std::string_view subTypeName;  ///< "Number", "Vector", …
+    std::string_view flags;        ///< "A+U", …
+    std::span<const Value> values; ///< times (type "KTime") are already in ticks of kTicksPerSecond
+};
+
+/// One object. Names and spellings are those of the 7.x generation.
+struct DocumentObject {
+    std::int64_t id = 0;
+    std::string_view record;   ///< "Model", "NodeAttribute", "Geometry", "Deformer", "Material", "AnimationCurve", …
+    std::string_view subClass; ///< "Mesh", "Camera", "LimbNode", "Skin", "Cluster", … may be empty
+    std::string_view name;     ///< without the class prefix; may be empty; bytes as in the file
+    std::vector<DocumentProperty> properties;
+    /// The object's sub-records in 7.x spelling (Vertices, LayerElementNormal, Shading, Indexes, …). Never null.
+    const Record* body = nullptr;
+    /// Index into Document::legacyCurves for a curve translated from a take; -1 for one that `body` describes.
+    int legacyCurve = -1;
+
+    [[nodiscard]] const DocumentProperty* property(std::string_view propertyName) const; ///< the last of that name
+};
+
+/// OO, OP, PO or PP: an end is a property when its name is not empty. Destination 0 is the scene's root.
+struct DocumentConnection {
+    std::int64_t source = 0;
+    std::int64_t destination = 0;
+    std::string_view sourceProperty;
+    std::string_view destinationProperty;
+};
+
+/// The class defaults that the file itself states, to be applied to objects of exactly that class.
+struct DocumentTemplate {
+    std::string_view record;    ///< "Model", "NodeAttribute", …
+    std::string_view className; ///< "FbxNode", "FbxCamera", …
+    std::vector<DocumentProperty> properties;
+};
+
+struct DocumentTake {
+    std::string_view name;
+    std::int64_t localStart = 0, localStop = 0, referenceStart = 0, referenceStop = 0; ///< ticks
+    bool hasLocal = false, hasReference = false;
+};
+
+/// Fog and ambient light, which have a place in files before 7.x only.
+struct DocumentLightSettings {
+    bool hasAmbient = false, hasFog = false;
+    double ambientColor[4] = {0, 0, 0, 1};
+    bool fogEnable = false;
+    int fogMode = 0;
+    double fogDensity = 0.002, fogStart = 0.3, fogEnd = 1000;
+    double fogColor[4] = {1, 1, 1, 1};
+};
+
+/// The keys of one curve in the attributes of the 7.x generation, unpacked.
+struct DocumentCurve {
+    struct Attribute {
+        std::uint32_t flags = 0; ///< interpolation, tangent, weight and velocity bits as in KeyAttrFlags
+        /// right slope (tension), next left slope (continuity), right weight (bias), next left weight,
+        /// right velocity, next left velocity
+        float data[6] = {0, 0, 1.0F / 3, 1.0F / 3, 0, 0};
+    };
+    struct Extrapolation {
+        char type = 'C';      ///< C constant, K keep slope, R repeat, M mirror, A repeat relative
+        int repetitions = -1; ///< -1: without end
+    };
+    double defaultValue = 0;
+    std::vector<std::int64_t> times;           ///< ascending, ticks of kTicksPerSecond
+    std::vector<float> values;                 ///< one per time
+    std::vector<Attribute> attributes;         ///< distinct attributes …
+    std::vector<std::uint32_t> attributeIndex; ///< … and one index into them per key
+    Extrapolation pre, post;
+};
+
+struct Document {
+    std::unique_ptr<RecordTree> tree;                  ///< owns everything the views point to
+    std::uint32_t version = 0;                         ///< of the document: 3000, 5000, 5800, 6100, 7100 … 7700
+    std::int64_t fileTicksPerSecond = kTicksPerSecond; ///< unit of the times that readCurve still finds in the tree
+    std::string creator;
+    std::vector<DocumentProperty> globalSettings;
+    DocumentLightSettings lightSettings;
+    std::string activeStackName;
+    std::vector<DocumentTemplate> templates;
+    std::vector<DocumentObject> objects;         ///< in file order; ids are unique and not 0
+    std::vector<DocumentConnection> connections; ///< in file order; both ends exist (or the root), none doubled
+    std::vector<DocumentTake> takes;
+    std::vector<DocumentCurve> legacyCurves;
+    /// What was repaired or dropped, a sentence each, with its place; bounded in number.
+    std::vector<std::string> warnings;
+
+    [[nodiscard]] const DocumentObject* find(std::int64_t id) const;
+
+    std::vector<std::pair<std::int64_t, std::uint32_t>> idIndex; ///< sorted; filled by readDocument
+};
+
+/// Reads a file of any generation. Null on failure; the status then names the file, the place and the fault.
+[[nodiscard]] std::unique_ptr<Document> readDocument(const std::string& fileName, FbxStatus& status);
+/// The same from a record tree that is already there.
+[[nodiscard]] std::unique_ptr<Document> readDocument(std::unique_ptr<RecordTree> tree, FbxStatus& status);
+
+/// The keys of an object of record "AnimationCurve", whichever generation it came from. Times and values of different
+/// length are cut to the shorter; unsorted keys are sorted, of equal times the later wins.
+[[nodiscard]] DocumentCurve readCurve(const Document& document, const DocumentObject& object);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,104 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A document under construction: what the readers of all generations share. Views handed in must live as long as the
+// record tree; the functions that make values and records store them there.
+#pragma once
+
+#include <initializer_list>
+#include <span>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "document/Document.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+class DocumentBuilder {
+public:
+    DocumentBuilder(std::unique_ptr<RecordTree> tree, std::uint32_t version);
+
+    [[nodiscard]] Document& document() { return *mDocument; }
+    [[nodiscard]] RecordTree& tree() { return *mDocument->tree; }
+    [[nodiscard]] const Record& root() const { return mDocument->tree->root; }
+    [[nodiscard]] std::unique_ptr<Document> release() { return std::move(mDocument); }
+
+    /// An id that no object of the index has. In files without ids of their own they are 1, 2, 3, …
+    [[nodiscard]] std::int64_t newId();
+    /// Appends an object. The reference is good until the next one is added.
+    DocumentObject& addObject(std::int64_t id, std::string_view record, std::string_view subClass,
+                              std::string_view name, const Record* body = nullptr);
+    /// Sorts the ids. Of objects with the same id the first stays.
+    void indexObjects();
+
+    void connect(std::int64_t source, std::int64_t destination, std::string_view destinationProperty = {},
+                 std::string_view sourceProperty = {});
+
+    /// Notes a repair. After a bounded number of sentences the rest is only counted.
+    void warn(std::string sentence);
+    /// The same with the record's place in front.
+    void warn(const Record& record, const std::string& sentence);
+
+    // Values and records that stand for what an older file says otherwise.
+    [[nodiscard]] std::span<const Value> keep(std::initializer_list<Value> values);
+    [[nodiscard]] std::span<const Value> keepReals(std::span<const double> numbers);
+    /// The first `count` numbers of a record as single values, whether it stores scalars or an array.
+    [[nodiscard]] std::span<const Value> numbersOf(const Record& record, std::size_t count);
+    /// A new record with values, to be put below another one with addChild.
+    Record& newRecord(std::string_view name, std::span<const Value> values = {});
+    /// A copy under another name; values and children are shared with the original.
+    Record& aliasOf(const Record& original, std::string_view name);
+
+    /// A time of this file in ticks of kTicksPerSecond.
+    [[nodiscard]] std::int64_t ticks(std::int64_t fileTicks) const;
+    /// Rescales the values of a KTime property; any other property stays as it is.
+    void rescale(DocumentProperty& property);
+
+private:
+    std::unique_ptr<Document> mDocument;
+    std::int64_t mLastNewId = 0;
+    std::size_t mSilentWarnings = 0;
+};
+
+/// Appends records below one in order, without walking the list each time.
+class ChildAppender {
+public:
+    explicit ChildAppender(Record& parent) : mParent(parent) { parent.hasBlock = true; }
+    void add(Record& child);
+
+private:
+    Record& mParent;
+    Record* mLast = nullptr;
+};
+
+/// One `P` or `Property` line: a name, its types and flags, and values behind them.
+[[nodiscard]] DocumentProperty propertyOf(std::string_view name, std::string_view typeName,
+                                          std::string_view subTypeName, std::string_view flags,
+                                          std::span<const Value> values);
+
+/// A name from the file as part of a sentence: in quotes, and cut when it is very long.
+[[nodiscard]] std::string quotedName(std::string_view name);
+
+/// The name without its class: `name 00 01 class` of a binary file, `class::name` of an ASCII one.
+[[nodiscard]] std::string_view nameWithoutClass(std::string_view fullName, bool ascii);
+
+/// Drops what cannot be connected and makes the Models a tree; see DocumentConnection for what then holds.
+void cleanConnections(DocumentBuilder& builder);
+
+/// The ends of a connection record in whatever form the generation names objects.
+struct ConnectionEnds {
+    const Value* source = nullptr; ///< null when the record is no connection
+    const Value* destination = nullptr;
+    std::string_view sourceProperty, destinationProperty;
+};
+[[nodiscard]] ConnectionEnds connectionEnds(const Record& record);
+
+// The readers, by generation. Each fills objects and connections; the rest is common.
+void readGeneration7(DocumentBuilder& builder);
+void readGeneration6(DocumentBuilder& builder);
+bool readGeneration5(DocumentBuilder& builder, FbxStatus& status);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

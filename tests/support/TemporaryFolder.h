@@ -1,0 +1,49 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A folder of its own for a test that needs files, gone when the test ends.
+#pragma once
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <stdexcept>
+#include <string>
+
+namespace support {
+
+class TemporaryFolder {
+public:
+    TemporaryFolder() {
+        std::string name = (std::filesystem::temp_directory_path() / "tarnell-test-XXXXXX").string();
+        if (!mkdtemp(name.data())) throw std::runtime_error("no temporary folder");
+        mPath = name;
+    }
+    TemporaryFolder(const TemporaryFolder&) = delete;
+    TemporaryFolder& operator=(const TemporaryFolder&) = delete;
+    ~TemporaryFolder() {
+        std::error_code ignored;
+        std::filesystem::permissions(mPath, std::filesystem::perms::owner_all, ignored);
+        std::filesystem::remove_all(mPath, ignored);
+    }
+
+    [[nodiscard]] std::string path() const { return mPath.string(); }
+    [[nodiscard]] std::string file(const std::string& name) const { return (mPath / name).string(); }
+
+    std::string write(const std::string& name, const std::string& content) const {
+        const std::filesystem::path target = mPath / name;
+        std::filesystem::create_directories(target.parent_path());
+        std::ofstream(target, std::ios::binary) << content;
+        return target.string();
+    }
+    [[nodiscard]] std::string read(const std::string& name) const {
+        std::ifstream in(mPath / name, std::ios::binary);
+        return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+    }
+
+private:
+    std::filesystem::path mPath;
+};
+
+} // namespace support
