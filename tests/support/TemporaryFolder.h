@@ -17,7 +17,8 @@ class TemporaryFolder {
 public:
     TemporaryFolder() {
         std::string name = (std::filesystem::temp_directory_path() / "tarnell-test-XXXXXX").string();
-        if (!mkdtemp(name.data())) throw std::runtime_error("no temporary folder");
+        if (!mkdtemp(name.data()))
+            throw std::runtime_error("no temporary folder");
         mPath = name;
     }
     TemporaryFolder(const TemporaryFolder&) = delete;

@@ -137,8 +137,8 @@ public:
     /// Sets everything of one key. An index out of range changes nothing.
     virtual void KeySet(int pKeyIndex, FbxTime pTime, float pValue,
                         FbxAnimCurveDef::EInterpolationType pInterpolation = FbxAnimCurveDef::eInterpolationCubic,
-                        FbxAnimCurveDef::ETangentMode pTangentMode = FbxAnimCurveDef::eTangentAuto,
-                        float pData0 = 0.0F, float pData1 = 0.0F,
+                        FbxAnimCurveDef::ETangentMode pTangentMode = FbxAnimCurveDef::eTangentAuto, float pData0 = 0.0F,
+                        float pData1 = 0.0F,
                         FbxAnimCurveDef::EWeightedMode pTangentWeightMode = FbxAnimCurveDef::eWeightedNone,
                         float pWeight0 = FbxAnimCurveDef::sDEFAULT_WEIGHT,
                         float pWeight1 = FbxAnimCurveDef::sDEFAULT_WEIGHT,
@@ -156,7 +156,8 @@ public:
     virtual void KeySetData(int pKeyIndex, FbxAnimCurveDef::EDataIndex pIndex, float pValue);
     virtual void KeyMultValue(float pMultValue);
 
-    /// The default value of the channel that the curve drives through its n-th curve node; also kept as the curve's own.
+    /// The default value of the channel that the curve drives through its n-th curve node; also kept as the curve's
+    /// own.
     [[nodiscard]] virtual float GetValue(int pCurveNodeIndex = 0) const;
     virtual void SetValue(float pValue, int pCurveNodeIndex = 0);
 

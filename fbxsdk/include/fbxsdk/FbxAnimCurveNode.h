@@ -25,10 +25,12 @@ public:
     [[nodiscard]] unsigned int GetChannelsCount() const;
     [[nodiscard]] int GetChannelIndex(const char* pChannelName) const; ///< -1 when unknown
     [[nodiscard]] FbxString GetChannelName(int pChannelId) const;
-    template <class T> [[nodiscard]] T GetChannelValue(unsigned int pChannelId, T pInitValue) const {
+    template <class T>
+    [[nodiscard]] T GetChannelValue(unsigned int pChannelId, T pInitValue) const {
         return pChannelId < GetChannelsCount() ? static_cast<T>(channelValue(pChannelId)) : pInitValue;
     }
-    template <class T> void SetChannelValue(unsigned int pChannelId, T pValue) {
+    template <class T>
+    void SetChannelValue(unsigned int pChannelId, T pValue) {
         setChannelValue(pChannelId, static_cast<double>(pValue));
     }
     [[nodiscard]] int GetCurveCount(unsigned int pChannelId, const char* pCurveNodeName = nullptr) const;

@@ -20,9 +20,10 @@ public:
     enum ECoordSystem : int { eRightHanded, eLeftHanded };
     enum EPreDefinedAxisSystem { eMayaZUp, eMayaYUp, eMax, eMotionBuilder, eOpenGL, eDirectX, eLightwave };
 
-    FbxAxisSystem() = default; ///< Y up, odd, right-handed
+    constexpr FbxAxisSystem() = default; ///< Y up, odd, right-handed
+    /// What is no axis or no parity gives the default system.
     FbxAxisSystem(EUpVector pUpVector, EFrontVector pFrontVector, ECoordSystem pCoorSystem);
-    explicit FbxAxisSystem(EPreDefinedAxisSystem pAxisSystem);
+    FbxAxisSystem(EPreDefinedAxisSystem pAxisSystem);
 
     bool operator==(const FbxAxisSystem& pOther) const;
     bool operator!=(const FbxAxisSystem& pOther) const { return !(*this == pOther); }

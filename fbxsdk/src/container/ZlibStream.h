@@ -6,6 +6,7 @@
 
 #include <cstdint>
 #include <span>
+#include <vector>
 
 #include <fbxsdk/FbxArch.h>
 
@@ -19,6 +20,9 @@ inline constexpr std::uint64_t kMaxDeflateRatio = 1032;
 ///
 /// False when the stream is corrupt or holds fewer or more bytes; the destination is then undefined.
 [[nodiscard]] bool inflateExactly(std::span<const char> stream, std::span<char> destination);
+
+/// Deflates bytes into a zlib stream. Empty when the stream would not be smaller than the bytes.
+[[nodiscard]] std::vector<char> deflated(std::span<const char> bytes);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -1,0 +1,122 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Reads one file as a host does, through the facade, and prints the answer and the time.
+#include "Measurement.h"
+
+#include <Fbx.h>
+#include <TnFbxCamera.h>
+#include <TnFbxError.h>
+#include <TnFbxMesh.h>
+#include <TnFbxReadInfo.h>
+#include <TnFbxTransform.h>
+
+#include <cstring>
+#include <memory>
+#include <string>
+
+namespace {
+
+using namespace Tarnell::Fbx;
+
+TnFbxReadInfo infoFor(const char* fileName) {
+    TnFbxReadInfo info;
+    info.setFileName(fileName);
+    info.setAnimationStackName("any"); // only has to be there
+    return info;
+}
+
+/// Polygon vertices and the box around the points, in the mesh's own space.
+bool readMeshes(const char* fileName, bench::Answer& answer, double& seconds) {
+    TnFbxReadInfo info = infoFor(fileName);
+    info.setTransformPoints(false);
+    TnFbxMesh* meshes = nullptr;
+    int count = 0;
+    const bench::Stopwatch watch;
+    const bool success = Fbx().getMeshes(info, &meshes, count);
+    seconds = watch.seconds();
+    const std::unique_ptr<TnFbxMesh[]> owner(meshes);
+    for (int i = 0; i < count; ++i) {
+        answer.count += meshes[i].getNumberOfPolygonVertices();
+        for (int point = 0; point < meshes[i].getNumberOfControlPoints(); ++point) {
+            float x = 0, y = 0, z = 0;
+            meshes[i].getControlPoint(point, x, y, z);
+            answer.include(static_cast<double>(x), static_cast<double>(y), static_cast<double>(z));
+        }
+    }
+    return success;
+}
+
+/// The file's own cameras (the library adds seven viewing cameras) and the box around their positions.
+bool readCameras(const char* fileName, bench::Answer& answer, double& seconds) {
+    constexpr int kProducerCameras = 7;
+    TnFbxReadInfo info = infoFor(fileName);
+    TnFbxCamera* cameras = nullptr;
+    int count = 0;
+    const bench::Stopwatch watch;
+    const bool success = Fbx().getCameras(info, &cameras, count);
+    seconds = watch.seconds();
+    const std::unique_ptr<TnFbxCamera[]> owner(cameras);
+    for (int i = kProducerCameras; i < count; ++i) {
+        ++answer.count;
+        const auto position = [&](TnFbxTransform::EFbxTransformChannelType channel) {
+            return static_cast<double>(cameras[i].getTransformValue(channel));
+        };
+        answer.include(position(TnFbxTransform::kFbxTransformPositionX),
+                       position(TnFbxTransform::kFbxTransformPositionY),
+                       position(TnFbxTransform::kFbxTransformPositionZ));
+    }
+    return success;
+}
+
+/// The nodes, and the box around their positions at the frames that carry keys.
+bool readTransforms(const char* fileName, bool global, bench::Answer& answer, double& seconds) {
+    constexpr int kFramesPerKey = 5;
+    TnFbxReadInfo info = infoFor(fileName);
+    info.setGlobalTransform(global);
+    TnFbxTransform* transforms = nullptr;
+    int count = 0;
+    const bench::Stopwatch watch;
+    const bool success = Fbx().getTransforms(info, &transforms, count);
+    seconds = watch.seconds();
+    const std::unique_ptr<TnFbxTransform[]> owner(transforms);
+    answer.count = count;
+    for (int i = 0; i < count; ++i) {
+        const TnFbxTime time = transforms[i].getTransformTime(TnFbxTransform::kFbxTransformPositionX);
+        for (int frame = time.getStartFrame(); frame <= time.getEndFrame(); frame += kFramesPerKey) {
+            const auto at = [&](TnFbxTransform::EFbxTransformChannelType channel) {
+                return static_cast<double>(transforms[i].getTransformValueAt(channel, static_cast<float>(frame)));
+            };
+            answer.include(at(TnFbxTransform::kFbxTransformPositionX), at(TnFbxTransform::kFbxTransformPositionY),
+                           at(TnFbxTransform::kFbxTransformPositionZ));
+        }
+    }
+    return success;
+}
+
+bool readMode(const std::string& mode, const char* fileName, bench::Answer& answer, double& seconds) {
+    if (mode == "mesh")
+        return readMeshes(fileName, answer, seconds);
+    if (mode == "cameras")
+        return readCameras(fileName, answer, seconds);
+    if (mode == "local")
+        return readTransforms(fileName, /*global*/ false, answer, seconds);
+    return readTransforms(fileName, /*global*/ true, answer, seconds);
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    if (argc != 3) {
+        std::fputs("usage: bench_read_tarnell mesh|cameras|local|global FILE\n", stderr);
+        return 2;
+    }
+    bench::Answer answer;
+    double seconds = 0;
+    if (!readMode(argv[1], argv[2], answer, seconds)) {
+        std::fprintf(stderr, "bench_read_tarnell: %s\n", lastError().c_str());
+        return 1;
+    }
+    bench::print(answer, seconds);
+    return 0;
+}

@@ -1,0 +1,37 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Class identities: the class tree of the platform's objects, for queries by class.
+#pragma once
+
+#include <fbxsdk/FbxArch.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+namespace detail {
+struct ClassInfo;
+}
+
+/// The identity of a class of objects. Cheap to copy; compares by identity.
+class FBXSDK_DLL FbxClassId {
+public:
+    constexpr FbxClassId() = default;
+    explicit constexpr FbxClassId(const detail::ClassInfo* pInfo) : mInfo(pInfo) {}
+
+    /// True for the same class and when this class derives from the other.
+    [[nodiscard]] bool Is(const FbxClassId& pId) const;
+    /// "FbxNode", "FbxCamera", …; empty for an invalid id.
+    [[nodiscard]] const char* GetName() const;
+    [[nodiscard]] bool IsValid() const { return mInfo != nullptr; }
+    [[nodiscard]] FbxClassId GetParent() const;
+
+    bool operator==(const FbxClassId& pOther) const { return mInfo == pOther.mInfo; }
+    bool operator!=(const FbxClassId& pOther) const { return mInfo != pOther.mInfo; }
+
+    [[nodiscard]] const detail::ClassInfo* info() const { return mInfo; }
+
+private:
+    const detail::ClassInfo* mInfo = nullptr;
+};
+
+FBXSDK_NAMESPACE_END

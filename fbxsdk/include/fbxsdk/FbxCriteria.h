@@ -1,0 +1,41 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Which objects a query over connections asks for.
+#pragma once
+
+#include <memory>
+
+#include <fbxsdk/FbxClassId.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+class FbxObject;
+
+/// A condition on objects. Cheap to copy; combined with &&, || and !.
+class FBXSDK_DLL FbxCriteria {
+public:
+    /// Objects of the class or of any class that derives from it.
+    static FbxCriteria ObjectType(const FbxClassId& pClassId);
+    /// Objects of exactly that class.
+    static FbxCriteria ObjectTypeStrict(const FbxClassId& pClassId);
+    /// Properties, never objects.
+    static FbxCriteria IsProperty();
+
+    FbxCriteria() = default; ///< meets every object
+
+    FbxCriteria operator&&(const FbxCriteria& pOther) const;
+    FbxCriteria operator||(const FbxCriteria& pOther) const;
+    FbxCriteria operator!() const;
+
+    [[nodiscard]] bool isMetBy(const FbxClassId& pClassId) const;
+
+private:
+    struct Node;
+    enum class Kind : unsigned char { any, type, strictType, property, both, either, inverse };
+    Kind mKind = Kind::any;
+    FbxClassId mClassId;
+    std::shared_ptr<const Node> mOperands; ///< of both, either and inverse
+};
+
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,19 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What can be imported and exported as a whole.
+#pragma once
+
+#include <fbxsdk/FbxCollection.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+class FBXSDK_DLL FbxDocument : public FbxCollection {
+    FBXSDK_OBJECT_DECLARE(FbxDocument, FbxCollection)
+
+public:
+    /// The name of the stack that the document's application had active; for information.
+    FbxPropertyT<FbxString> ActiveAnimStackName;
+};
+
+FBXSDK_NAMESPACE_END

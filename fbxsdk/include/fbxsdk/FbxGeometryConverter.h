@@ -1,0 +1,32 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Surfaces become meshes.
+#pragma once
+
+#include <fbxsdk/FbxArch.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+class FbxManager;
+class FbxNodeAttribute;
+class FbxScene;
+
+class FBXSDK_DLL FbxGeometryConverter {
+public:
+    explicit FbxGeometryConverter(FbxManager* pManager) : mManager(pManager) {}
+
+    /// A mesh of triangles for a NURBS surface, patch or mesh, with materials, skins and shapes carried over; the
+    /// attribute itself when it is a mesh of triangles already. Null for other kinds and for degenerate surfaces.
+    ///
+    /// With pReplace the mesh takes the attribute's place on every node, and the attribute is destroyed; without, the
+    /// mesh stands beside it on every node. pLegacy makes no difference.
+    FbxNodeAttribute* Triangulate(FbxNodeAttribute* pNodeAttribute, bool pReplace, bool pLegacy = false);
+    /// The same for every attribute of the scene that it applies to. False when one of them could not be converted.
+    bool Triangulate(FbxScene* pScene, bool pReplace, bool pLegacy = false);
+
+private:
+    FbxManager* mManager;
+};
+
+FBXSDK_NAMESPACE_END

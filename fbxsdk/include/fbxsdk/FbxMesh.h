@@ -1,0 +1,94 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Polygons over control points.
+#pragma once
+
+#include <fbxsdk/FbxGeometry.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+/// Polygon p has its corners, indices of control points, at GetPolygonVertexIndex(p) and the following places of the
+/// polygon vertex array. In a mesh read from a file all of them are control points that exist.
+class FBXSDK_DLL FbxMesh : public FbxGeometry {
+    FBXSDK_OBJECT_DECLARE(FbxMesh, FbxGeometry)
+
+public:
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+
+    /// Starts a polygon. Material, texture and group are stored when layer 0 has such an element mapped by polygon; -1
+    /// stores nothing.
+    void BeginPolygon(int pMaterial = -1, int pTexture = -1, int pGroup = -1, bool pLegacy = true);
+    /// Appends a corner; whether the control point exists is not checked. The texture coordinate's index is stored when
+    /// it is not negative and layer 0 has coordinates mapped by polygon vertex with indices. Without a polygon that was
+    /// begun nothing happens.
+    void AddPolygon(int pIndex, int pTextureUVIndex = -1);
+    void EndPolygon();
+
+    [[nodiscard]] int GetPolygonCount() const {
+        ensureLoaded();
+        return mPolygonStarts.count();
+    }
+    /// 0 out of range.
+    [[nodiscard]] int GetPolygonSize(int pPolygonIndex) const {
+        if (pPolygonIndex < 0 || pPolygonIndex >= GetPolygonCount())
+            return 0;
+        return polygonEnd(pPolygonIndex) - mPolygonStarts[pPolygonIndex];
+    }
+    [[nodiscard]] int GetPolygonVertexCount() const {
+        ensureLoaded();
+        return mPolygonVertices.count();
+    }
+    /// Where the polygon starts in the polygon vertex array; -1 out of range.
+    [[nodiscard]] int GetPolygonVertexIndex(int pPolygonIndex) const {
+        return pPolygonIndex >= 0 && pPolygonIndex < GetPolygonCount() ? mPolygonStarts[pPolygonIndex] : -1;
+    }
+    /// Null when there are none; good until the count changes.
+    [[nodiscard]] int* GetPolygonVertices() const {
+        return GetPolygonVertexCount() == 0 ? nullptr : mPolygonVertices.data();
+    }
+    /// A corner's control point; -1 out of range.
+    [[nodiscard]] int GetPolygonVertex(int pPolygonIndex, int pPositionInPolygon) const {
+        const int corner = cornerOf(pPolygonIndex, pPositionInPolygon);
+        return corner < 0 ? -1 : mPolygonVertices[corner];
+    }
+
+    /// The normal of layer 0 at a corner, as stored, when it is mapped by polygon vertex or by control point. False
+    /// otherwise; the normal is untouched then.
+    bool GetPolygonVertexNormal(int pPolyIndex, int pVertexIndex, FbxVector4& pNormal) const;
+    /// Where the corner's texture coordinate stands in the direct array of layer 0, when it is mapped by polygon
+    /// vertex; -1 otherwise.
+    [[nodiscard]] int GetTextureUVIndex(int pPolygonIndex, int pPositionInPolygon,
+                                        FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eTextureDiffuse);
+
+    /// Takes the polygon out, with what layers hold for it and its corners. The index, or -1 when there is none.
+    int RemovePolygon(int pPolygonIndex);
+    /// Whether every polygon has three corners; true without polygons.
+    [[nodiscard]] bool IsTriangleMesh() const;
+    void ReservePolygonCount(int pCount);
+    void ReservePolygonVertexCount(int pCount);
+
+    /// The platform's own view: the polygons as they are, without asking the file.
+    [[nodiscard]] detail::PlainArray<int>& polygonVertices() { return mPolygonVertices; }
+    [[nodiscard]] detail::PlainArray<int>& polygonStarts() { return mPolygonStarts; }
+
+protected:
+    bool readSource(const detail::GeometrySource& pSource) override;
+
+private:
+    [[nodiscard]] int polygonEnd(int pPolygonIndex) const {
+        const int next = pPolygonIndex + 1;
+        return next < mPolygonStarts.count() ? mPolygonStarts[next] : mPolygonVertices.count();
+    }
+    /// The corner's place in the polygon vertex array; -1 out of range.
+    [[nodiscard]] int cornerOf(int pPolygonIndex, int pPositionInPolygon) const {
+        const bool inRange = pPositionInPolygon >= 0 && pPositionInPolygon < GetPolygonSize(pPolygonIndex);
+        return inRange ? mPolygonStarts[pPolygonIndex] + pPositionInPolygon : -1;
+    }
+
+    detail::PlainArray<int> mPolygonVertices;
+    detail::PlainArray<int> mPolygonStarts;
+    bool mPolygonOpen = false;
+};
+
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,21 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The NURBS surface of older writers.
+#pragma once
+
+#include <fbxsdk/FbxNurbsSurface.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+class FBXSDK_DLL FbxNurbs : public FbxNurbsSurfaceBase {
+    FBXSDK_OBJECT_DECLARE(FbxNurbs, FbxGeometry)
+
+public:
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+
+protected:
+    bool readSource(const detail::GeometrySource& pSource) override;
+};
+
+FBXSDK_NAMESPACE_END

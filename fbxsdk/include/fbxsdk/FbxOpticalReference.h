@@ -1,0 +1,18 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The reference of a group of optical markers.
+#pragma once
+
+#include <fbxsdk/FbxNodeAttribute.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+class FBXSDK_DLL FbxOpticalReference : public FbxNodeAttribute {
+    FBXSDK_OBJECT_DECLARE(FbxOpticalReference, FbxNodeAttribute)
+
+public:
+    [[nodiscard]] EType GetAttributeType() const override;
+};
+
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,21 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// How a node's transform takes up its parent's.
+#pragma once
+
+#include <fbxsdk/FbxArch.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+class FBXSDK_DLL FbxTransform {
+public:
+    /// Where the parent's scaling (S) enters among the child's rotation (r) and scaling (s).
+    enum EInheritType {
+        eInheritRrSs = 0, ///< after the child's rotation, along the child's axes
+        eInheritRSrs = 1, ///< before it: the plain product of the matrices
+        eInheritRrs = 2   ///< the parent's own scaling is left out
+    };
+};
+
+FBXSDK_NAMESPACE_END

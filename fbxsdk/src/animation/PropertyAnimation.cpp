@@ -1,0 +1,103 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The curves of a property: found, and made on demand, through the curve node that a layer holds for it.
+#include <cstring>
+
+#include <fbxsdk/FbxAnimCurve.h>
+#include <fbxsdk/FbxAnimCurveNode.h>
+#include <fbxsdk/FbxAnimLayer.h>
+#include <fbxsdk/FbxAnimStack.h>
+#include <fbxsdk/FbxScene.h>
+
+#include "animation/PropertyEvaluation.h"
+#include "scene/PropertyConversion.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace {
+
+FbxAnimLayer* firstLayer(const FbxProperty& property) {
+    FbxScene* scene = property.IsValid() ? property.GetFbxObject()->GetScene() : nullptr;
+    FbxAnimStack* stack = scene ? scene->GetCurrentAnimationStack() : nullptr;
+    return stack ? stack->GetMember<FbxAnimLayer>(0) : nullptr;
+}
+
+/// Null selects the first channel. Files and hosts name colour channels by component, so X, Y and Z also stand for R, G
+/// and B where a node has those.
+int channelOf(const FbxAnimCurveNode& node, const char* channel) {
+    if (!channel)
+        return node.GetChannelsCount() > 0 ? 0 : -1;
+    const int index = node.GetChannelIndex(channel);
+    if (index >= 0)
+        return index;
+    constexpr const char* kAliases[][2] = {{"X", "R"}, {"Y", "G"}, {"Z", "B"}};
+    for (const auto& alias : kAliases) {
+        if (std::strcmp(channel, alias[0]) == 0)
+            return node.GetChannelIndex(alias[1]);
+    }
+    return -1;
+}
+
+} // namespace
+
+FbxAnimCurve* FbxProperty::GetCurve(FbxAnimLayer* pAnimLayer, bool pCreate) {
+    return GetCurve(pAnimLayer, nullptr, nullptr, pCreate);
+}
+
+FbxAnimCurve* FbxProperty::GetCurve(FbxAnimLayer* pAnimLayer, const char* pChannel, bool pCreate) {
+    return GetCurve(pAnimLayer, nullptr, pChannel, pCreate);
+}
+
+FbxAnimCurve* FbxProperty::GetCurve(FbxAnimLayer* pAnimLayer, const char* pName, const char* pChannel, bool pCreate) {
+    if (!IsValid() || !pAnimLayer)
+        return nullptr;
+    if (pName && std::strcmp(pName, GetNameAsCStr()) != 0)
+        return nullptr;
+    FbxAnimCurveNode* node = GetCurveNode(pAnimLayer, pCreate);
+    if (!node)
+        return nullptr;
+    const int channel = channelOf(*node, pChannel);
+    if (channel < 0)
+        return nullptr;
+    FbxAnimCurve* curve = node->GetCurve(static_cast<unsigned int>(channel));
+    return curve || !pCreate ? curve : node->CreateCurve("", static_cast<unsigned int>(channel));
+}
+
+FbxAnimCurveNode* FbxProperty::GetCurveNode(bool pCreate) { return GetCurveNode(firstLayer(*this), pCreate); }
+
+FbxAnimCurveNode* FbxProperty::GetCurveNode(FbxAnimStack* pAnimStack, bool pCreate) {
+    return pAnimStack ? GetCurveNode(pAnimStack->GetMember<FbxAnimLayer>(0), pCreate) : nullptr;
+}
+
+FbxAnimCurveNode* FbxProperty::GetCurveNode(FbxAnimLayer* pAnimLayer, bool pCreate) {
+    if (!IsValid() || !pAnimLayer)
+        return nullptr;
+    const FbxCriteria curveNodes = FbxCriteria::ObjectType(FbxAnimCurveNode::ClassId);
+    for (int i = 0; FbxObject* source = GetSrcObject(curveNodes, i); ++i) {
+        if (source->IsConnectedDstObject(pAnimLayer))
+            return static_cast<FbxAnimCurveNode*>(source);
+    }
+    return pCreate ? pAnimLayer->CreateCurveNode(*this) : nullptr;
+}
+
+FbxAnimCurveNode* FbxProperty::CreateCurveNode(FbxAnimLayer* pAnimLayer) { return GetCurveNode(pAnimLayer, true); }
+
+bool FbxProperty::IsAnimated(FbxAnimLayer* pAnimLayer) const {
+    FbxProperty self = *this;
+    const FbxAnimCurveNode* node = self.GetCurveNode(pAnimLayer ? pAnimLayer : firstLayer(*this), false);
+    return node && node->IsAnimated();
+}
+
+void FbxProperty::evaluate(void* pValue, EFbxType pType, const FbxTime& pTime) {
+    readValue(pValue, pType);
+    FbxScene* scene = IsValid() ? mObject->GetScene() : nullptr;
+    if (!scene || pTime == FBXSDK_TIME_INFINITE)
+        return;
+    detail::AnimatedProperty animation = detail::bindAnimation(*this, scene->GetCurrentAnimationStack());
+    if (!animation.animated())
+        return;
+    const detail::Components value = detail::evaluateAnimation(animation, pTime, FbxEuler::eOrderXYZ);
+    detail::convertNumbers(value, pValue, pType);
+}
+
+FBXSDK_NAMESPACE_END

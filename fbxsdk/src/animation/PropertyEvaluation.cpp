@@ -1,0 +1,179 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// How animation layers combine. The base layer replaces the property's static value; each further layer adds to what is
+// there, or overrides it, by its weight. Rotations compose and scales multiply unless the layer says otherwise.
+#include "animation/PropertyEvaluation.h"
+
+#include <algorithm>
+#include <cmath>
+#include <string_view>
+
+#include <fbxsdk/FbxAnimCurve.h>
+#include <fbxsdk/FbxAnimCurveNode.h>
+#include <fbxsdk/FbxAnimLayer.h>
+#include <fbxsdk/FbxAnimStack.h>
+
+#include "core/Rotation.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+LayerRule ruleOf(std::string_view propertyName) {
+    if (propertyName == "Lcl Rotation")
+        return LayerRule::rotation;
+    if (propertyName == "Lcl Scaling")
+        return LayerRule::scaling;
+    return LayerRule::sum;
+}
+
+FbxAnimCurveNode* curveNodeOn(const FbxProperty& property, const FbxAnimLayer& layer) {
+    const FbxCriteria curveNodes = FbxCriteria::ObjectType(FbxAnimCurveNode::ClassId);
+    for (int i = 0;; ++i) {
+        FbxObject* source = property.GetSrcObject(curveNodes, i);
+        if (!source)
+            return nullptr;
+        if (source->IsConnectedDstObject(&layer))
+            return static_cast<FbxAnimCurveNode*>(source);
+    }
+}
+
+bool anySolo(const FbxAnimStack& stack, int layerCount) {
+    for (int i = 0; i < layerCount; ++i) {
+        if (stack.GetMember<FbxAnimLayer>(i)->Solo.Get())
+            return true;
+    }
+    return false;
+}
+
+/// What the layer says for each component: its curve's value, or the channel's where it has none.
+Components layerValue(LayerContribution& contribution, const FbxTime& time) {
+    Components value{};
+    const unsigned int count = std::min(contribution.curveNode->GetChannelsCount(), 4U);
+    for (unsigned int i = 0; i < count; ++i) {
+        FbxAnimCurve* curve = contribution.curveNode->GetCurve(i);
+        value[i] = curve && curve->KeyGetCount() > 0
+                       ? static_cast<double>(curve->Evaluate(time, &contribution.hints[i]))
+                       : contribution.curveNode->channelValue(i);
+    }
+    return value;
+}
+
+double weightOf(FbxAnimLayer& layer, const FbxTime& time) {
+    double percent = layer.Weight.Get();
+    // An animated weight is a curve node on the layer's own property.
+    if (const FbxAnimCurveNode* curveNode = layer.Weight.GetSrcObject<FbxAnimCurveNode>()) {
+        FbxAnimCurve* curve = curveNode->GetCurve(0);
+        if (curve && curve->KeyGetCount() > 0)
+            percent = static_cast<double>(curve->Evaluate(time));
+    }
+    const double weight = percent / 100.0;
+    return weight > 0.0 ? std::min(weight, 1.0) : 0.0; // NaN counts as 0
+}
+
+/// A factor of partial weight: 1 at weight 0, the factor itself at weight 1, keeping its sign between.
+double weightedFactor(double factor, double weight) {
+    if (weight >= 1.0)
+        return factor;
+    if (weight <= 0.0)
+        return 1.0;
+    return std::copysign(std::pow(std::abs(factor), weight), factor);
+}
+
+Components eulerOf(const FbxQuaternion& rotation, FbxEuler::EOrder order) {
+    const FbxVector4 angles = eulerFromQuaternion(rotation, order);
+    return {angles[0], angles[1], angles[2], 0.0};
+}
+
+FbxQuaternion quaternionOf(const Components& degrees, FbxEuler::EOrder order) {
+    return quaternionFromEuler(FbxVector4(degrees[0], degrees[1], degrees[2]), order);
+}
+
+Components addLayer(const Components& below, const Components& layer, double weight, LayerRule rule,
+                    const FbxAnimLayer& settings, FbxEuler::EOrder order) {
+    if (rule == LayerRule::rotation && settings.RotationAccumulationMode.Get() == FbxAnimLayer::eRotationByLayer) {
+        const FbxQuaternion turn = slerp(FbxQuaternion(), quaternionOf(layer, order), weight);
+        return eulerOf(quaternionOf(below, order) * turn, order);
+    }
+    Components sum = below;
+    const bool multiplies =
+        rule == LayerRule::scaling && settings.ScaleAccumulationMode.Get() == FbxAnimLayer::eScaleMultiply;
+    for (std::size_t i = 0; i < sum.size(); ++i) {
+        if (multiplies) {
+            sum[i] *= weightedFactor(layer[i], weight);
+        } else {
+            sum[i] += weight * layer[i];
+        }
+    }
+    return sum;
+}
+
+Components overrideLayer(const Components& below, const Components& layer, double weight, LayerRule rule,
+                         const FbxAnimLayer& settings, FbxEuler::EOrder order) {
+    if (rule == LayerRule::rotation && settings.RotationAccumulationMode.Get() == FbxAnimLayer::eRotationByLayer) {
+        return eulerOf(slerp(quaternionOf(below, order), quaternionOf(layer, order), weight), order);
+    }
+    Components mix{};
+    const bool multiplies =
+        rule == LayerRule::scaling && settings.ScaleAccumulationMode.Get() == FbxAnimLayer::eScaleMultiply;
+    for (std::size_t i = 0; i < mix.size(); ++i) {
+        mix[i] = multiplies ? weightedFactor(below[i], 1.0 - weight) * weightedFactor(layer[i], weight)
+                            : (1.0 - weight) * below[i] + weight * layer[i];
+    }
+    return mix;
+}
+
+Components combine(const Components& below, const Components& layer, const FbxAnimLayer& settings, double weight,
+                   const AnimatedProperty& animation, FbxEuler::EOrder order) {
+    const EFbxType type = animation.property.GetPropertyDataType().GetType();
+    const bool discrete = type == eFbxBool || type == eFbxEnum || settings.GetBlendModeBypass(type);
+    if (discrete)
+        return layer;
+    switch (settings.BlendMode.Get()) {
+    case FbxAnimLayer::eBlendOverride:
+        return layer;
+    case FbxAnimLayer::eBlendOverridePassthrough:
+        return weight >= 1.0 ? layer : overrideLayer(below, layer, weight, animation.rule, settings, order);
+    default:
+        return addLayer(below, layer, weight, animation.rule, settings, order);
+    }
+}
+
+} // namespace
+
+AnimatedProperty bindAnimation(const FbxProperty& property, FbxAnimStack* stack) {
+    AnimatedProperty animation;
+    animation.property = property;
+    animation.rule = ruleOf(property.GetNameAsCStr());
+    const FbxDouble4 value = property.Get<FbxDouble4>();
+    animation.staticValue = {value[0], value[1], value[2], value[3]};
+    if (!stack || property.GetSrcObjectCount() == 0)
+        return animation;
+
+    const int layerCount = stack->GetMemberCount<FbxAnimLayer>();
+    const bool soloOnly = anySolo(*stack, layerCount);
+    for (int i = 0; i < layerCount; ++i) {
+        FbxAnimLayer* layer = stack->GetMember<FbxAnimLayer>(i);
+        if (layer->Mute.Get() || (soloOnly && !layer->Solo.Get()))
+            continue;
+        const FbxAnimCurveNode* curveNode = curveNodeOn(property, *layer);
+        if (curveNode)
+            animation.contributions.push_back({layer, curveNode, i == 0});
+    }
+    return animation;
+}
+
+Components evaluateAnimation(AnimatedProperty& animation, const FbxTime& time, FbxEuler::EOrder rotationOrder) {
+    Components value = animation.staticValue;
+    for (LayerContribution& contribution : animation.contributions) {
+        const Components layer = layerValue(contribution, time);
+        value = contribution.base ? layer
+                                  : combine(value, layer, *contribution.layer, weightOf(*contribution.layer, time),
+                                            animation, rotationOrder);
+    }
+    return value;
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

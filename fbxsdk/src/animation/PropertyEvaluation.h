@@ -1,0 +1,50 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The value of a property at a time, over all layers of a stack.
+#pragma once
+
+#include <array>
+#include <vector>
+
+#include <fbxsdk/FbxEuler.h>
+#include <fbxsdk/FbxProperty.h>
+
+FBXSDK_NAMESPACE_BEGIN
+class FbxAnimCurveNode;
+class FbxAnimLayer;
+class FbxAnimStack;
+namespace detail {
+
+using Components = std::array<double, 4>;
+
+/// How the layers of a property combine, from the property's name.
+enum class LayerRule { sum, rotation, scaling };
+
+/// One layer that has a say for a property.
+struct LayerContribution {
+    FbxAnimLayer* layer = nullptr;
+    const FbxAnimCurveNode* curveNode = nullptr;
+    bool base = false;                        ///< the stack's first layer: it replaces the static value
+    std::array<int, 4> hints{-1, -1, -1, -1}; ///< search hints of the component curves
+};
+
+/// A property with the layers that animate it, lowest first. Valid until the scene changes.
+struct AnimatedProperty {
+    FbxProperty property;
+    LayerRule rule = LayerRule::sum;
+    Components staticValue{};
+    std::vector<LayerContribution> contributions;
+
+    [[nodiscard]] bool animated() const { return !contributions.empty(); }
+};
+
+/// Looks up the layers of the stack that animate the property; muted layers are left out, and when any layer of the
+/// stack is solo all that are not. A null stack gives the static value alone.
+AnimatedProperty bindAnimation(const FbxProperty& property, FbxAnimStack* stack);
+
+/// The value at the time. The rotation order matters to layers that compose rotations.
+Components evaluateAnimation(AnimatedProperty& animation, const FbxTime& time, FbxEuler::EOrder rotationOrder);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

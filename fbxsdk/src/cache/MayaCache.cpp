@@ -1,0 +1,218 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Maya caches in use: finding samples by time, and writing them one after another.
+#include "cache/MayaCache.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+#include <filesystem>
+#include <system_error>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+namespace fs = std::filesystem;
+
+/// The path of the description without its extension: data files are named after it.
+std::string baseOf(const std::string& descriptionFile) {
+    fs::path path(descriptionFile);
+    return path.replace_extension().string();
+}
+
+std::int32_t ticksAt(double seconds) {
+    const double ticks = std::round(seconds * kMayaTicksPerSecond);
+    return std::isfinite(ticks) ? static_cast<std::int32_t>(std::clamp(ticks, -2147483647.0, 2147483647.0)) : 0;
+}
+
+/// The number at the front of the text, which is cut off. False when there is none.
+bool takeNumber(std::string_view& text, std::int64_t& number) {
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
+    if (error != std::errc())
+        return false;
+    text.remove_prefix(static_cast<std::size_t>(end - text.data()));
+    return true;
+}
+
+/// "<base>Frame12" or "<base>Frame12Tick80" → ticks.
+bool frameFileTicks(std::string_view name, std::string_view base, std::int64_t ticksPerFrame, std::int32_t& ticks) {
+    constexpr std::string_view kFrame = "Frame", kTick = "Tick";
+    if (!name.starts_with(base))
+        return false;
+    name.remove_prefix(base.size());
+    if (!name.starts_with(kFrame))
+        return false;
+    name.remove_prefix(kFrame.size());
+    std::int64_t frame = 0, tick = 0;
+    if (!takeNumber(name, frame))
+        return false;
+    if (name.starts_with(kTick)) {
+        name.remove_prefix(kTick.size());
+        if (!takeNumber(name, tick))
+            return false;
+    }
+    constexpr std::int64_t kMaximumFrame = 1 << 20;
+    if (!name.empty() || std::abs(frame) > kMaximumFrame || tick < 0 || tick >= ticksPerFrame)
+        return false;
+    const std::int64_t all = frame * ticksPerFrame + tick;
+    if (std::abs(all) > INT32_MAX)
+        return false;
+    ticks = static_cast<std::int32_t>(all);
+    return true;
+}
+
+} // namespace
+
+std::unique_ptr<MayaCacheReader> MayaCacheReader::open(const std::string& descriptionFile, FbxStatus& status) {
+    auto reader = std::make_unique<MayaCacheReader>();
+    if (!readMayaCacheDescription(descriptionFile, reader->mDescription, status))
+        return nullptr;
+    const std::string base = baseOf(descriptionFile);
+    if (reader->mDescription.oneFile) {
+        reader->openOneFile(base, status);
+    } else {
+        reader->listFrameFiles(base);
+    }
+    if (!reader->mSamples.empty())
+        return reader;
+    if (!status.Error()) {
+        status.SetCode(FbxStatus::eInvalidFile, "%s: no samples in its data files", descriptionFile.c_str());
+    }
+    return nullptr;
+}
+
+void MayaCacheReader::openOneFile(const std::string& base, FbxStatus& status) {
+    mData = MappedFile::open(base + mDescription.dataExtension(), status);
+    if (!mData)
+        return;
+    for (MayaCacheFrame& frame : parseMayaCacheData(mData->bytes())) {
+        const std::int32_t ticks = frame.hasTime ? frame.ticks : mDescription.start;
+        mSamples.try_emplace(ticks, Sample{{}, std::move(frame)}); // of equal times the first counts
+    }
+}
+
+void MayaCacheReader::listFrameFiles(const std::string& base) {
+    const fs::path basePath(base);
+    std::error_code error;
+    for (fs::directory_iterator entry(basePath.parent_path().empty() ? "." : basePath.parent_path(), error), end;
+         !error && entry != end; entry.increment(error)) {
+        const fs::path& file = entry->path();
+        std::int32_t ticks = 0;
+        if (file.extension() != mDescription.dataExtension())
+            continue;
+        if (!frameFileTicks(file.stem().string(), basePath.filename().string(), mDescription.ticksPerFrame, ticks)) {
+            continue;
+        }
+        mSamples.try_emplace(ticks, Sample{file.string(), {}});
+    }
+}
+
+bool MayaCacheReader::readSample(const Sample& sample, const std::string& channel, std::span<double> points,
+                                 FbxStatus& status) {
+    std::shared_ptr<const MappedFile> file;
+    std::vector<MayaCacheFrame> frames;
+    const MayaCacheFrame* frame = &sample.frame;
+    if (!sample.file.empty()) {
+        file = MappedFile::open(sample.file, status);
+        if (!file)
+            return false;
+        frames = parseMayaCacheData(file->bytes());
+        if (frames.empty()) {
+            status.SetCode(FbxStatus::eInvalidFile, "%s: no sample in it", sample.file.c_str());
+            return false;
+        }
+        frame = &frames.front();
+    }
+    for (const MayaCacheBlock& block : frame->blocks) {
+        if (block.channel != channel)
+            continue;
+        if (readMayaCacheBlock(block, points))
+            return true;
+        status.SetCode(FbxStatus::eInvalidParameter, "channel %s has %llu points, not %zu", channel.c_str(),
+                       static_cast<unsigned long long>(block.elementCount), points.size() / 3);
+        return false;
+    }
+    status.SetCode(FbxStatus::eInvalidFile, "the sample has no channel %s", channel.c_str());
+    return false;
+}
+
+bool MayaCacheReader::read(const std::string& channel, double seconds, std::span<double> points, FbxStatus& status) {
+    const double ticks = seconds * kMayaTicksPerSecond;
+    if (std::isnan(ticks))
+        return false;
+    const auto after =
+        mSamples.upper_bound(static_cast<std::int32_t>(std::clamp(std::floor(ticks), -2147483648.0, 2147483647.0)));
+    if (after == mSamples.begin())
+        return readSample(after->second, channel, points, status);
+    const auto before = std::prev(after);
+    if (!readSample(before->second, channel, points, status))
+        return false;
+    if (after == mSamples.end())
+        return true;
+
+    const double span = static_cast<double>(after->first) - static_cast<double>(before->first);
+    const double part = (ticks - static_cast<double>(before->first)) / span;
+    // Seconds come as floats: a time this close to a sample is that sample.
+    constexpr double kSameSample = 1e-3;
+    if (part * span < kSameSample)
+        return true;
+    std::vector<double> next(points.size());
+    if (!readSample(after->second, channel, next, status))
+        return false;
+    for (std::size_t i = 0; i < points.size(); ++i)
+        points[i] += part * (next[i] - points[i]);
+    return true;
+}
+
+bool MayaCacheReader::sampleRange(std::int32_t& first, std::int32_t& last) const {
+    if (mSamples.empty())
+        return false;
+    first = mSamples.begin()->first;
+    last = mSamples.rbegin()->first;
+    return true;
+}
+
+std::unique_ptr<MayaCacheWriter> MayaCacheWriter::open(const std::string& descriptionFile,
+                                                       const MayaCacheDescription& description, FbxStatus& status) {
+    auto writer = std::make_unique<MayaCacheWriter>();
+    writer->mDescriptionFile = descriptionFile;
+    writer->mDescription = description;
+    const std::string dataFile = baseOf(descriptionFile) + description.dataExtension();
+    writer->mData.open(dataFile, std::ios::binary | std::ios::trunc);
+    // Like other writers of one-file caches: the true range stands in the description.
+    writer->mData << mayaCacheHeader(description.wide, 0, 1);
+    if (writer->mData)
+        return writer;
+    status.SetCode(FbxStatus::eFailure, "%s: cannot be written", dataFile.c_str());
+    return nullptr;
+}
+
+bool MayaCacheWriter::write(std::size_t channel, double seconds, std::span<const double> points) {
+    if (channel >= mDescription.channels.size() || !std::isfinite(seconds))
+        return false;
+    MayaCacheChannel& target = mDescription.channels[channel];
+    const std::int32_t ticks = ticksAt(seconds);
+    const MayaCacheWriteBlock block{target.name, points, target.type != "FloatVectorArray"};
+    mData << mayaCacheFrame(mDescription.wide, &ticks, {&block, 1});
+    mFailed = mFailed || !mData;
+    for (auto* start : {&mDescription.start, &target.start})
+        *start = mAnySample ? std::min(*start, ticks) : ticks;
+    for (auto* end : {&mDescription.end, &target.end})
+        *end = mAnySample ? std::max(*end, ticks) : ticks;
+    mAnySample = true;
+    return !mFailed;
+}
+
+bool MayaCacheWriter::close(FbxStatus& status) {
+    mData.close();
+    if (mFailed || !mData) {
+        status.SetCode(FbxStatus::eFailure, "%s: its data could not be written", mDescriptionFile.c_str());
+        return false;
+    }
+    return writeMayaCacheDescription(mDescriptionFile, mDescription, status);
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

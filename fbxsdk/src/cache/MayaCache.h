@@ -1,0 +1,67 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Open Maya caches: one for reading, one for writing.
+#pragma once
+
+#include <fstream>
+#include <map>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "cache/MayaCacheData.h"
+#include "cache/MayaCacheDescription.h"
+#include "container/MappedFile.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// Samples by time over one data file or over one file per sample.
+class MayaCacheReader {
+public:
+    /// Null when the description or every data file is missing or damaged.
+    [[nodiscard]] static std::unique_ptr<MayaCacheReader> open(const std::string& descriptionFile, FbxStatus& status);
+
+    [[nodiscard]] const MayaCacheDescription& description() const { return mDescription; }
+    /// The channel's points at a time in seconds, between two samples in a straight line, outside them the nearest one.
+    [[nodiscard]] bool read(const std::string& channel, double seconds, std::span<double> points, FbxStatus& status);
+    /// Times of the first and last sample in ticks. False when there is none.
+    [[nodiscard]] bool sampleRange(std::int32_t& first, std::int32_t& last) const;
+
+private:
+    struct Sample {
+        std::string file;     ///< of caches with a file per sample; empty otherwise
+        MayaCacheFrame frame; ///< of caches in one file
+    };
+
+    void openOneFile(const std::string& base, FbxStatus& status);
+    void listFrameFiles(const std::string& base);
+    bool readSample(const Sample& sample, const std::string& channel, std::span<double> points, FbxStatus& status);
+
+    MayaCacheDescription mDescription;
+    std::map<std::int32_t, Sample> mSamples; ///< by tick
+    std::shared_ptr<const MappedFile> mData; ///< of caches in one file
+};
+
+/// A cache in one file, of one or more channels.
+class MayaCacheWriter {
+public:
+    [[nodiscard]] static std::unique_ptr<MayaCacheWriter>
+    open(const std::string& descriptionFile, const MayaCacheDescription& description, FbxStatus& status);
+    /// Appends a sample. Times must ascend for readers that do not sort.
+    [[nodiscard]] bool write(std::size_t channel, double seconds, std::span<const double> points);
+    /// Completes the data file and writes the description.
+    [[nodiscard]] bool close(FbxStatus& status);
+    [[nodiscard]] MayaCacheDescription& description() { return mDescription; }
+
+private:
+    std::string mDescriptionFile;
+    MayaCacheDescription mDescription;
+    std::ofstream mData;
+    bool mAnySample = false;
+    bool mFailed = false;
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,139 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Cache descriptions by pugixml. Attribute order, quotes, unknown tags and entities are taken as they come.
+#include "cache/MayaCacheDescription.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cstring>
+#include <filesystem>
+#include <fstream>
+#include <system_error>
+
+#include <pugixml.hpp>
+
+#include "container/MappedFile.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+constexpr const char* kRootTag = "Autodesk_Cache_File";
+/// A description has four levels; more than this is a trap for recursive code.
+constexpr int kMaximumDepth = 32;
+/// Descriptions are a few kilobytes.
+constexpr std::size_t kMaximumBytes = std::size_t{16} << 20U;
+
+int toTicks(const char* text, int fallback) {
+    int number = 0;
+    const auto [end, error] = std::from_chars(text, text + std::strlen(text), number);
+    return error == std::errc() ? number : fallback;
+}
+
+/// "250-7500"; either number may be negative.
+void readRange(const char* text, MayaCacheDescription& description) {
+    const std::string range(text);
+    const std::size_t dash = range.size() > 1 ? range.find('-', 1) : std::string::npos;
+    if (dash == std::string::npos)
+        return;
+    description.start = toTicks(range.substr(0, dash).c_str(), 0);
+    description.end = toTicks(range.substr(dash + 1).c_str(), 0);
+}
+
+bool nestsTooDeeply(const pugi::xml_node& root) {
+    struct DepthWalker : pugi::xml_tree_walker {
+        bool for_each(pugi::xml_node&) override { return depth() < kMaximumDepth; }
+    } walker;
+    pugi::xml_node start = root;
+    return !start.traverse(walker);
+}
+
+MayaCacheChannel readChannel(const pugi::xml_node& node, const MayaCacheDescription& description) {
+    MayaCacheChannel channel;
+    channel.name = node.attribute("ChannelName").as_string();
+    channel.type = node.attribute("ChannelType").as_string("DoubleVectorArray");
+    channel.interpretation = node.attribute("ChannelInterpretation").as_string("positions");
+    channel.regular = std::strcmp(node.attribute("SamplingType").as_string("Regular"), "Irregular") != 0;
+    channel.samplingRate = toTicks(node.attribute("SamplingRate").as_string(), description.ticksPerFrame);
+    channel.start = toTicks(node.attribute("StartTime").as_string(), description.start);
+    channel.end = toTicks(node.attribute("EndTime").as_string(), description.end);
+    return channel;
+}
+
+bool isChannelTag(const char* name) {
+    constexpr const char* kPrefix = "channel";
+    const std::size_t length = std::strlen(kPrefix);
+    return std::strncmp(name, kPrefix, length) == 0 && name[length] >= '0' && name[length] <= '9';
+}
+
+} // namespace
+
+bool readMayaCacheDescription(const std::string& fileName, MayaCacheDescription& description, FbxStatus& status) {
+    const auto file = MappedFile::open(fileName, status);
+    if (!file)
+        return false;
+    if (file->bytes().size() > kMaximumBytes) {
+        status.SetCode(FbxStatus::eInvalidFile, "%s: a cache description of %zu bytes", fileName.c_str(),
+                       file->bytes().size());
+        return false;
+    }
+    pugi::xml_document document;
+    const pugi::xml_parse_result parsed = document.load_buffer(file->bytes().data(), file->bytes().size());
+    if (!parsed) {
+        status.SetCode(FbxStatus::eInvalidFile, "%s: offset %td: %s", fileName.c_str(), parsed.offset,
+                       parsed.description());
+        return false;
+    }
+    const pugi::xml_node root = document.child(kRootTag);
+    if (!root || nestsTooDeeply(root)) {
+        status.SetCode(FbxStatus::eInvalidFile, "%s: not a cache description", fileName.c_str());
+        return false;
+    }
+    const pugi::xml_node type = root.child("cacheType");
+    description = {};
+    description.oneFile = std::strcmp(type.attribute("Type").as_string("OneFile"), "OneFilePerFrame") != 0;
+    description.wide = std::strcmp(type.attribute("Format").as_string("mcc"), "mcx") == 0;
+    description.ticksPerFrame =
+        std::max(toTicks(root.child("cacheTimePerFrame").attribute("TimePerFrame").as_string(), 250), 1);
+    readRange(root.child("time").attribute("Range").as_string(), description);
+    for (const pugi::xml_node& node : root.child("Channels").children()) {
+        if (isChannelTag(node.name()))
+            description.channels.push_back(readChannel(node, description));
+    }
+    return true;
+}
+
+bool writeMayaCacheDescription(const std::string& fileName, const MayaCacheDescription& description,
+                               FbxStatus& status) {
+    pugi::xml_document document;
+    pugi::xml_node declaration = document.append_child(pugi::node_declaration);
+    declaration.append_attribute("version") = "1.0";
+    pugi::xml_node root = document.append_child(kRootTag);
+    pugi::xml_node type = root.append_child("cacheType");
+    type.append_attribute("Type") = description.oneFile ? "OneFile" : "OneFilePerFrame";
+    type.append_attribute("Format") = description.wide ? "mcx" : "mcc";
+    const std::string range = std::to_string(description.start) + "-" + std::to_string(description.end);
+    root.append_child("time").append_attribute("Range") = range.c_str();
+    root.append_child("cacheTimePerFrame").append_attribute("TimePerFrame") = description.ticksPerFrame;
+    root.append_child("cacheVersion").append_attribute("Version") = "2.0";
+    pugi::xml_node channels = root.append_child("Channels");
+    for (std::size_t i = 0; i < description.channels.size(); ++i) {
+        const MayaCacheChannel& channel = description.channels[i];
+        pugi::xml_node node = channels.append_child(("channel" + std::to_string(i)).c_str());
+        node.append_attribute("ChannelName") = channel.name.c_str();
+        node.append_attribute("ChannelType") = channel.type.c_str();
+        node.append_attribute("ChannelInterpretation") = channel.interpretation.c_str();
+        node.append_attribute("SamplingType") = channel.regular ? "Regular" : "Irregular";
+        node.append_attribute("SamplingRate") = channel.samplingRate;
+        node.append_attribute("StartTime") = channel.start;
+        node.append_attribute("EndTime") = channel.end;
+    }
+    if (document.save_file(fileName.c_str(), "  "))
+        return true;
+    status.SetCode(FbxStatus::eFailure, "%s: cannot be written", fileName.c_str());
+    return false;
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

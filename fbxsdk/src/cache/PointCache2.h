@@ -1,0 +1,60 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Max point caches, version 2. Little-endian: a header of 32 bytes, then sample after sample of x, y, z floats.
+//
+//   0 "POINTCACHE2\0" · 12 i32 version 1 · 16 i32 points · 20 f32 start frame · 24 f32 frames per sample · 28 i32
+//   samples
+#pragma once
+
+#include <fstream>
+#include <memory>
+#include <span>
+#include <string>
+
+#include "container/MappedFile.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+struct PointCacheHeader {
+    std::uint32_t pointCount = 0;
+    double startFrame = 0;
+    double framesPerSample = 1;
+    std::uint32_t sampleCount = 0;
+};
+
+class PointCacheReader {
+public:
+    [[nodiscard]] static std::unique_ptr<PointCacheReader> open(const std::string& fileName, FbxStatus& status);
+    [[nodiscard]] const PointCacheHeader& header() const { return mHeader; }
+    /// The points at a frame, between samples in a straight line, outside them the nearest one. False when the cache
+    /// has another number of points.
+    [[nodiscard]] bool read(double frame, std::span<double> points) const;
+
+private:
+    [[nodiscard]] float number(std::uint64_t sample, std::size_t index) const;
+
+    std::shared_ptr<const MappedFile> mFile;
+    PointCacheHeader mHeader;
+};
+
+class PointCacheWriter {
+public:
+    [[nodiscard]] static std::unique_ptr<PointCacheWriter> open(const std::string& fileName,
+                                                                const PointCacheHeader& header, FbxStatus& status);
+    /// Writes the sample of a frame to its place. False for a frame outside the samples.
+    [[nodiscard]] bool write(double frame, const double* points);
+    /// Fills up missing samples at the end, so that the file has the size that its header promises.
+    [[nodiscard]] bool close(FbxStatus& status);
+    [[nodiscard]] const PointCacheHeader& header() const { return mHeader; }
+
+private:
+    std::string mFileName;
+    std::fstream mFile;
+    PointCacheHeader mHeader;
+    bool mFailed = false;
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

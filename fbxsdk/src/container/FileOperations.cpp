@@ -1,0 +1,131 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The system calls of writing, with interruptions and short counts taken care of.
+#include "container/FileOperations.h"
+
+#include <cerrno>
+#include <csignal>
+#include <cstdio>
+#include <ctime>
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+int outcome(int result) { return result < 0 ? errno : 0; }
+
+/// Repeats a write until all bytes are through. `step` gets what is left and how much went before.
+template <class Step>
+int writeAll(std::span<const char> bytes, const Step& step) {
+    std::size_t done = 0;
+    while (done < bytes.size()) {
+        const ssize_t count = step(bytes.subspan(done), done);
+        if (count < 0) {
+            if (errno == EINTR) {
+                continue;
+            }
+            return errno;
+        }
+        if (count == 0) {
+            return EIO;
+        }
+        done += static_cast<std::size_t>(count);
+    }
+    return 0;
+}
+
+/// Keeps the signal of a broken pipe from this thread, and takes back one that arrived meanwhile.
+class PipeSignalGuard {
+public:
+    PipeSignalGuard() {
+        sigemptyset(&mSignal);
+        sigaddset(&mSignal, SIGPIPE);
+        sigset_t pending;
+        sigpending(&pending);
+        mWasPending = sigismember(&pending, SIGPIPE) == 1;
+        pthread_sigmask(SIG_BLOCK, &mSignal, &mBefore);
+    }
+    PipeSignalGuard(const PipeSignalGuard&) = delete;
+    PipeSignalGuard& operator=(const PipeSignalGuard&) = delete;
+    ~PipeSignalGuard() {
+        if (!mWasPending) {
+            constexpr timespec kNow{};
+            while (sigtimedwait(&mSignal, nullptr, &kNow) == -1 && errno == EINTR) {
+            }
+        }
+        pthread_sigmask(SIG_SETMASK, &mBefore, nullptr);
+    }
+
+private:
+    sigset_t mSignal, mBefore;
+    bool mWasPending = false;
+};
+
+} // namespace
+
+int FileOperations::create(const std::string& path, unsigned permissions, int& file) {
+    constexpr mode_t kUsual = 0666; // less what the process masks
+    file = ::open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, kUsual);
+    if (file < 0) {
+        return errno;
+    }
+    // Where the file system knows no permissions, the file is written all the same.
+    if (permissions != 0 && ::fchmod(file, static_cast<mode_t>(permissions)) != 0 && errno != EPERM &&
+        errno != ENOTSUP) {
+        const int error = errno;
+        ::close(file);
+        ::unlink(path.c_str());
+        file = -1;
+        return error;
+    }
+    return 0;
+}
+
+int FileOperations::openExisting(const std::string& path, int& file) {
+    file = ::open(path.c_str(), O_WRONLY | O_CLOEXEC);
+    return outcome(file);
+}
+
+int FileOperations::write(int file, std::span<const char> bytes) {
+    const PipeSignalGuard guard;
+    return writeAll(bytes, [file](auto rest, std::size_t) { return ::write(file, rest.data(), rest.size()); });
+}
+
+int FileOperations::writeAt(int file, std::uint64_t offset, std::span<const char> bytes) {
+    return writeAll(bytes, [=](auto rest, std::size_t done) {
+        return ::pwrite(file, rest.data(), rest.size(), static_cast<off_t>(offset + done));
+    });
+}
+
+int FileOperations::flush(int file) {
+    const int error = outcome(::fsync(file));
+    // What cannot be flushed at all, such as a device, has nothing to lose.
+    return error == EINVAL || error == ENOTSUP ? 0 : error;
+}
+
+int FileOperations::close(int file) {
+    const int error = outcome(::close(file));
+    return error == EINTR ? 0 : error; // the descriptor is gone nevertheless
+}
+
+int FileOperations::rename(const std::string& from, const std::string& to) {
+    return outcome(std::rename(from.c_str(), to.c_str()));
+}
+
+int FileOperations::remove(const std::string& path) { return outcome(::unlink(path.c_str())); }
+
+void FileOperations::flushFolder(const std::string& path) {
+    const int folder = ::open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (folder >= 0) {
+        ::fsync(folder);
+        ::close(folder);
+    }
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,39 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What writing a file asks of the system. Tests put a class in between that fails where they say.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <span>
+#include <string>
+
+#include <fbxsdk/FbxArch.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// Each operation returns 0 or the system's error number.
+class FileOperations {
+public:
+    virtual ~FileOperations() = default;
+
+    /// Opens a file that must not be there yet, with the usual permissions or, unless 0, with those given.
+    virtual int create(const std::string& path, unsigned permissions, int& file);
+    /// Opens a pipe or a device.
+    virtual int openExisting(const std::string& path, int& file);
+    /// Writes all bytes. A reader that went away is an error, not a signal.
+    virtual int write(int file, std::span<const char> bytes);
+    virtual int writeAt(int file, std::uint64_t offset, std::span<const char> bytes);
+    /// Returns when the bytes are on the medium.
+    virtual int flush(int file);
+    virtual int close(int file);
+    virtual int rename(const std::string& from, const std::string& to);
+    virtual int remove(const std::string& path);
+    /// Makes the names in a folder outlast a power cut; without an outcome, since not every file system can.
+    virtual void flushFolder(const std::string& path);
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,92 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Deformers of a geometry.
+#include <fbxsdk/FbxGeometry.h>
+
+#include <fbxsdk/FbxBlendShape.h>
+#include <fbxsdk/FbxBlendShapeChannel.h>
+
+#include "geometry/GeometrySource.h"
+#include "geometry/SourceList.h"
+#include "scene/ManagerData.h"
+
+FBXSDK_NAMESPACE_BEGIN
+
+FBXSDK_ABSTRACT_IMPLEMENT(FbxGeometry, FbxGeometryBase)
+
+namespace {
+
+template <class T>
+T* withStatus(T* found, FbxStatus* status) {
+    if (!status)
+        return found;
+    if (found)
+        status->Clear();
+    else
+        status->SetCode(FbxStatus::eIndexOutOfRange);
+    return found;
+}
+
+} // namespace
+
+FbxGeometry::FbxGeometry(FbxManager& pManager, const detail::ClassInfo& pInfo) : FbxGeometryBase(pManager, pInfo) {}
+
+FbxGeometry::~FbxGeometry() = default;
+
+int FbxGeometry::AddDeformer(FbxDeformer* pDeformer) {
+    if (!pDeformer)
+        return -1;
+    detail::addSource(*this, mDeformers, pDeformer);
+    return detail::indexOf(mDeformers, pDeformer);
+}
+
+FbxDeformer* FbxGeometry::RemoveDeformer(int pIndex, FbxStatus* pStatus) {
+    return detail::removeSource(*this, mDeformers, GetDeformer(pIndex, pStatus));
+}
+
+FbxDeformer* FbxGeometry::GetDeformer(int pIndex, FbxStatus* pStatus) const {
+    return withStatus(detail::sourceAt(mDeformers, pIndex), pStatus);
+}
+
+int FbxGeometry::GetDeformerCount(FbxDeformer::EDeformerType pType) const {
+    return static_cast<int>(std::count_if(mDeformers.begin(), mDeformers.end(), [pType](const FbxDeformer* deformer) {
+        return deformer->GetDeformerType() == pType;
+    }));
+}
+
+FbxDeformer* FbxGeometry::GetDeformer(int pIndex, FbxDeformer::EDeformerType pType, FbxStatus* pStatus) const {
+    int index = pIndex;
+    for (FbxDeformer* deformer : mDeformers) {
+        if (deformer->GetDeformerType() == pType && index-- == 0)
+            return withStatus(deformer, pStatus);
+    }
+    return withStatus<FbxDeformer>(nullptr, pStatus);
+}
+
+int FbxGeometry::GetShapeCount() const {
+    int count = 0;
+    for (FbxDeformer* deformer : mDeformers) {
+        auto* blendShape = FbxCast<FbxBlendShape>(deformer);
+        for (int i = 0; blendShape && i < blendShape->GetBlendShapeChannelCount(); ++i)
+            count += blendShape->GetBlendShapeChannel(i)->GetTargetShapeCount();
+    }
+    return count;
+}
+
+FbxAnimCurve* FbxGeometry::GetShapeChannel(int pBlendShapeIndex, int pBlendShapeChannelIndex, FbxAnimLayer* pLayer,
+                                           bool pCreateAsNeeded, FbxStatus* pStatus) {
+    auto* blendShape = static_cast<FbxBlendShape*>(GetDeformer(pBlendShapeIndex, FbxDeformer::eBlendShape, pStatus));
+    if (!blendShape)
+        return nullptr;
+    FbxBlendShapeChannel* channel = withStatus(blendShape->GetBlendShapeChannel(pBlendShapeChannelIndex), pStatus);
+    return channel ? channel->DeformPercent.GetCurve(pLayer, pCreateAsNeeded) : nullptr;
+}
+
+void FbxGeometry::connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) {
+    FbxGeometryBase::connectionChanged(pSource, pDestination, pConnected);
+    if (&pDestination == this)
+        detail::followConnection(mDeformers, pSource, pConnected);
+}
+
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,93 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Meshes and shapes.
+#include "geometry/GeometryReading.h"
+
+#include <algorithm>
+#include <vector>
+
+#include "geometry/ItemReading.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+/// Corners come as in files: a negative entry is the last corner of its polygon, all bits inverted. A last polygon that
+/// is never closed ends with the list. Corners at points that do not exist go to point 0; when there are no points,
+/// there can be no polygons.
+void cutIntoPolygons(PlainArray<int>& corners, PlainArray<int>& starts, int pointCount) {
+    if (pointCount == 0) {
+        corners.clear();
+        return;
+    }
+    starts.reserve(static_cast<int>(std::count_if(corners.begin(), corners.end(), [](int i) { return i < 0; })) + 1);
+    const int count = corners.count();
+    int start = 0;
+    for (int i = 0; i < count; ++i) {
+        int& corner = corners[i];
+        const bool last = corner < 0;
+        if (last)
+            corner = ~corner;
+        if (corner >= pointCount)
+            corner = 0;
+        if (last) {
+            starts.add(start);
+            start = i + 1;
+        }
+    }
+    if (start < count)
+        starts.add(start);
+}
+
+/// Adds offsets, three numbers each, to the points that the indices name; without indices to the first points in order.
+void applyOffsets(PlainArray<FbxVector4>& points, const PlainArray<int>* indices, const std::vector<double>& offsets) {
+    int count = static_cast<int>(offsets.size() / 3);
+    if (indices)
+        count = std::min(count, indices->count());
+    const double* offset = offsets.data();
+    for (int i = 0; i < count; ++i, offset += 3) {
+        const int index = indices ? (*indices)[i] : i;
+        if (!points.contains(index))
+            continue;
+        for (int axis = 0; axis < 3; ++axis)
+            points[index][axis] += offset[axis];
+    }
+}
+
+} // namespace
+
+void attachSource(FbxGeometryBase& geometry, const std::shared_ptr<const Document>& document,
+                  const DocumentObject& object) {
+    geometry.setSource(std::make_unique<GeometrySource>(GeometrySource{document, object.body}));
+}
+
+void readMesh(FbxMesh& mesh, const Record& body) {
+    if (const Record* vertices = body.child("Vertices"))
+        readItems(*vertices, mesh.points());
+    if (const Record* polygons = body.child("PolygonVertexIndex")) {
+        readItems(*polygons, mesh.polygonVertices());
+        cutIntoPolygons(mesh.polygonVertices(), mesh.polygonStarts(), mesh.points().count());
+    }
+}
+
+void readShape(FbxShape& shape, const FbxGeometryBase& base, const Record& body) {
+    const int count = base.GetControlPointsCount();
+    shape.points().resizeUninitialised(count);
+    std::copy_n(base.GetControlPoints(), count, shape.points().begin());
+
+    const Record* vertices = body.child("Vertices");
+    if (!vertices)
+        return;
+    std::vector<double> offsets(std::min(vertices->numberCount(), 3 * static_cast<std::size_t>(INT32_MAX / 4)));
+    if (!vertices->readNumbers(std::span<double>(offsets)))
+        return;
+    PlainArray<int> indices;
+    const Record* indexRecord = body.child("Indexes");
+    if (indexRecord)
+        readItems(*indexRecord, indices);
+    applyOffsets(shape.points(), indexRecord ? &indices : nullptr, offsets);
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,30 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Where an object's content stands as long as nobody has asked for it.
+#pragma once
+
+#include <memory>
+
+#include "container/Record.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+struct Document;
+
+/// The sub-records of one object of a file. The document is held only to keep the records alive.
+struct GeometrySource {
+    std::shared_ptr<const Document> document;
+    const Record* body = nullptr;
+};
+
+/// The arrays of one layer element; null for an array that the element has not.
+struct ElementSource {
+    std::shared_ptr<const Document> document;
+    const Record* direct = nullptr;
+    const Record* index = nullptr;
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

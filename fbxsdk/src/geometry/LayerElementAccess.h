@@ -1,0 +1,39 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What the readers of files may do with layers and elements, and hosts may not.
+#pragma once
+
+#include <fbxsdk/FbxLayer.h>
+
+#include "geometry/GeometrySource.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+struct LayerElementAccess {
+    /// The element's arrays are decoded when somebody asks for one of them.
+    static void setSource(FbxLayerElement& element, std::unique_ptr<ElementSource> source) {
+        element.mSource = std::move(source);
+    }
+    [[nodiscard]] static bool isPending(const FbxLayerElement& element) { return element.mSource != nullptr; }
+
+    // Slots of a layer: an element type, or the texture coordinates of a texture channel.
+    [[nodiscard]] static int uvSlot(FbxLayerElement::EType channel) { return FbxLayer::uvSlot(channel); }
+    [[nodiscard]] static FbxLayerElement* elementAt(const FbxLayer& layer, int slot) { return layer.mElements[slot]; }
+    /// The element's class must be that of the slot.
+    static void setElement(FbxLayer& layer, int slot, FbxLayerElement& element) { layer.set(&element, slot); }
+
+    /// Makes the element a damaged one.
+    template <class T>
+    static void removeDirectArray(FbxLayerElementTemplate<T>& element) {
+        element.mDirectArray.reset();
+    }
+    template <class T>
+    static void removeIndexArray(FbxLayerElementTemplate<T>& element) {
+        element.mIndexArray.reset();
+    }
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

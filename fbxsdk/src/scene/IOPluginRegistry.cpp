@@ -1,0 +1,89 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The table of formats. Readers and writers are the same two.
+#include <fbxsdk/FbxIOPluginRegistry.h>
+
+#include <cstring>
+#include <iterator>
+
+#include <fbxsdk/FbxString.h>
+
+#include "container/AsciiPreamble.h"
+#include "container/BinaryReader.h"
+#include "container/MappedFile.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace {
+
+struct Format {
+    const char* description;
+    const char* extension;
+};
+constexpr int kBinary = 0, kAscii = 1;
+constexpr Format kFormats[] = {{"FBX binary (*.fbx)", "fbx"}, {"FBX ascii (*.fbx)", "fbx"}};
+constexpr const char* kVersions[] = {"FBX201000", "FBX201100", "FBX201200", "FBX201300",
+                                     "FBX201400", "FBX201600", nullptr};
+
+const Format* formatAt(int index) {
+    return index >= 0 && index < static_cast<int>(std::size(kFormats)) ? &kFormats[index] : nullptr;
+}
+
+} // namespace
+
+int FbxIOPluginRegistry::GetReaderFormatCount() const { return static_cast<int>(std::size(kFormats)); }
+int FbxIOPluginRegistry::GetWriterFormatCount() const { return static_cast<int>(std::size(kFormats)); }
+
+const char* FbxIOPluginRegistry::GetReaderFormatDescription(int pFileFormat) const {
+    return GetWriterFormatDescription(pFileFormat);
+}
+const char* FbxIOPluginRegistry::GetWriterFormatDescription(int pFileFormat) const {
+    const Format* format = formatAt(pFileFormat);
+    return format ? format->description : "";
+}
+const char* FbxIOPluginRegistry::GetReaderFormatExtension(int pFileFormat) const {
+    return GetWriterFormatExtension(pFileFormat);
+}
+const char* FbxIOPluginRegistry::GetWriterFormatExtension(int pFileFormat) const {
+    const Format* format = formatAt(pFileFormat);
+    return format ? format->extension : "";
+}
+bool FbxIOPluginRegistry::ReaderIsFBX(int pFileFormat) const { return formatAt(pFileFormat) != nullptr; }
+bool FbxIOPluginRegistry::WriterIsFBX(int pFileFormat) const { return formatAt(pFileFormat) != nullptr; }
+int FbxIOPluginRegistry::GetNativeReaderFormat() const { return kBinary; }
+int FbxIOPluginRegistry::GetNativeWriterFormat() const { return kBinary; }
+
+bool FbxIOPluginRegistry::DetectReaderFileFormat(const char* pFileName, int& pFileFormat) const {
+    pFileFormat = -1;
+    FbxStatus status;
+    const auto file = pFileName ? detail::MappedFile::open(pFileName, status) : nullptr;
+    if (!file)
+        return false;
+    if (detail::isBinary(file->bytes()))
+        pFileFormat = kBinary;
+    if (pFileFormat < 0 && detail::isAscii(file->bytes()))
+        pFileFormat = kAscii;
+    return pFileFormat >= 0;
+}
+
+int FbxIOPluginRegistry::FindWriterIDByDescription(const char* pDescription) const {
+    for (int i = 0; pDescription && i < GetWriterFormatCount(); ++i) {
+        if (std::strcmp(kFormats[i].description, pDescription) == 0)
+            return i;
+    }
+    return -1;
+}
+
+int FbxIOPluginRegistry::FindWriterIDByExtension(const char* pExtension) const {
+    for (int i = 0; pExtension && i < GetWriterFormatCount(); ++i) {
+        if (FbxString(kFormats[i].extension).CompareNoCase(pExtension) == 0)
+            return i;
+    }
+    return -1;
+}
+
+char const* const* FbxIOPluginRegistry::GetWritableVersions(int pFileFormat) const {
+    return formatAt(pFileFormat) ? kVersions : nullptr;
+}
+
+FBXSDK_NAMESPACE_END

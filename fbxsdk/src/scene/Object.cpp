@@ -1,0 +1,167 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Objects: identity, properties by name, connections and membership in a scene.
+#include <fbxsdk/FbxObject.h>
+
+#include <unordered_set>
+#include <vector>
+
+#include <fbxsdk/FbxScene.h>
+
+#include "scene/ManagerData.h"
+#include "scene/ObjectData.h"
+#include "scene/SceneData.h"
+
+FBXSDK_NAMESPACE_BEGIN
+
+namespace detail {
+extern const ClassInfo kFbxObjectInfo;
+extern const ClassInfo kFbxObjectInfo;
+constinit const ClassInfo kFbxObjectInfo{"FbxObject", nullptr, {}, &ManagerData::construct<FbxObject>};
+} // namespace detail
+constinit const FbxClassId FbxObject::ClassId{&detail::kFbxObjectInfo};
+
+FbxObject* FbxObject::Create(FbxManager* pManager, const char* pName) {
+    return detail::ManagerData::create<FbxObject>(pManager, pName);
+}
+FbxObject* FbxObject::Create(FbxObject* pContainer, const char* pName) {
+    return detail::ManagerData::create<FbxObject>(pContainer, pName);
+}
+
+FbxObject::FbxObject(FbxManager& pManager, const detail::ClassInfo& pInfo)
+    : RootProperty(this, detail::kRootProperty), mData(std::make_unique<detail::ObjectData>()) {
+    mData->info = &pInfo;
+    mData->manager = &pManager;
+    mData->plug.object = this;
+    pManager.data().enter(*this);
+}
+
+FbxObject::~FbxObject() { mData->manager->data().leave(*this); }
+
+void FbxObject::Destroy(bool pRecursive) {
+    // What every scene has goes with the scene only.
+    const auto isKept = [this](const FbxObject& object) {
+        const FbxScene* scene = object.GetScene();
+        return scene && scene != this && scene->sceneData().isFixed(object);
+    };
+    if (isKept(*this))
+        return;
+    std::vector<FbxObject*> doomed{this};
+    std::unordered_set<const FbxObject*> known{this};
+    const auto doom = [&](const detail::ConnectionPoint& source) {
+        if (source.property >= 0 || isKept(*source.object) || !known.insert(source.object).second)
+            return;
+        doomed.push_back(source.object);
+    };
+    for (std::size_t i = 0; pRecursive && i < doomed.size(); ++i) {
+        for (const detail::ConnectionPoint* source : doomed[i]->mData->plug.sources)
+            doom(*source);
+    }
+    // A scene takes its members along, and its members are its sources.
+    for (const detail::ConnectionPoint* source : mData->plug.sources) {
+        if (Is<FbxScene>() && source->object->GetScene() == this)
+            doom(*source);
+    }
+    detail::ManagerData::destroyTogether(doomed);
+}
+
+FbxClassId FbxObject::GetClassId() const { return FbxClassId(mData->info); }
+
+const char* FbxObject::GetName() const { return mData->name.c_str(); }
+
+void FbxObject::SetName(const char* pName) { mData->name = pName ? pName : ""; }
+
+FbxManager* FbxObject::GetFbxManager() const { return mData->manager; }
+
+FbxScene* FbxObject::GetScene() const { return mData->scene; }
+
+FbxDocument* FbxObject::GetDocument() const { return mData->scene; }
+
+FbxProperty FbxObject::FindProperty(const char* pName, bool pCaseSensitive) const {
+    const int index = pName ? mData->findProperty(pName, pCaseSensitive) : -1;
+    return index < 0 ? FbxProperty() : FbxProperty(const_cast<FbxObject*>(this), index);
+}
+
+FbxProperty FbxObject::FindProperty(const char* pName, const FbxDataType& pDataType, bool pCaseSensitive) const {
+    const FbxProperty property = FindProperty(pName, pCaseSensitive);
+    return property.IsValid() && property.GetPropertyDataType() == pDataType ? property : FbxProperty();
+}
+
+FbxProperty FbxObject::GetFirstProperty() const {
+    return mData->propertyCount() > 0 ? FbxProperty(const_cast<FbxObject*>(this), 0) : FbxProperty();
+}
+
+FbxProperty FbxObject::GetNextProperty(const FbxProperty& pProperty) const {
+    const int next = pProperty.index() + 1;
+    return pProperty.GetFbxObject() == this && next < mData->propertyCount()
+               ? FbxProperty(const_cast<FbxObject*>(this), next)
+               : FbxProperty();
+}
+
+bool FbxObject::ConnectSrcObject(FbxObject* pObject, FbxConnection::EType) {
+    return pObject && detail::ObjectData::connect(pObject->mData->plug, mData->plug);
+}
+
+bool FbxObject::ConnectDstObject(FbxObject* pObject, FbxConnection::EType) {
+    return pObject && detail::ObjectData::connect(mData->plug, pObject->mData->plug);
+}
+
+bool FbxObject::IsConnectedSrcObject(const FbxObject* pObject) const {
+    return pObject && detail::isConnected(pObject->mData->plug, mData->plug);
+}
+
+bool FbxObject::IsConnectedDstObject(const FbxObject* pObject) const {
+    return pObject && detail::isConnected(mData->plug, pObject->mData->plug);
+}
+
+bool FbxObject::DisconnectSrcObject(FbxObject* pObject) {
+    return pObject && detail::ObjectData::disconnect(pObject->mData->plug, mData->plug);
+}
+
+bool FbxObject::DisconnectDstObject(FbxObject* pObject) {
+    return pObject && detail::ObjectData::disconnect(mData->plug, pObject->mData->plug);
+}
+
+bool FbxObject::ConnectSrcProperty(const FbxProperty& pProperty) {
+    return pProperty.IsValid() &&
+           detail::ObjectData::connect(pProperty.GetFbxObject()->mData->materialise(pProperty.index()).plug,
+                                       mData->plug);
+}
+
+bool FbxObject::ConnectDstProperty(const FbxProperty& pProperty) {
+    return pProperty.IsValid() &&
+           detail::ObjectData::connect(mData->plug,
+                                       pProperty.GetFbxObject()->mData->materialise(pProperty.index()).plug);
+}
+
+int FbxObject::GetSrcObjectCount() const { return detail::countObjects(mData->plug.sources, FbxCriteria()); }
+int FbxObject::GetSrcObjectCount(const FbxCriteria& pCriteria) const {
+    return detail::countObjects(mData->plug.sources, pCriteria);
+}
+FbxObject* FbxObject::GetSrcObject(int pIndex) const {
+    return detail::objectAt(mData->plug.sources, FbxCriteria(), pIndex);
+}
+FbxObject* FbxObject::GetSrcObject(const FbxCriteria& pCriteria, int pIndex) const {
+    return detail::objectAt(mData->plug.sources, pCriteria, pIndex);
+}
+int FbxObject::GetDstObjectCount() const { return detail::countObjects(mData->plug.destinations, FbxCriteria()); }
+int FbxObject::GetDstObjectCount(const FbxCriteria& pCriteria) const {
+    return detail::countObjects(mData->plug.destinations, pCriteria);
+}
+FbxObject* FbxObject::GetDstObject(int pIndex) const {
+    return detail::objectAt(mData->plug.destinations, FbxCriteria(), pIndex);
+}
+FbxObject* FbxObject::GetDstObject(const FbxCriteria& pCriteria, int pIndex) const {
+    return detail::objectAt(mData->plug.destinations, pCriteria, pIndex);
+}
+int FbxObject::GetSrcPropertyCount() const { return detail::countProperties(mData->plug.sources); }
+FbxProperty FbxObject::GetSrcProperty(int pIndex) const { return detail::propertyAt(mData->plug.sources, pIndex); }
+int FbxObject::GetDstPropertyCount() const { return detail::countProperties(mData->plug.destinations); }
+FbxProperty FbxObject::GetDstProperty(int pIndex) const { return detail::propertyAt(mData->plug.destinations, pIndex); }
+
+void FbxObject::connectionChanged(FbxObject&, FbxObject&, bool) {}
+
+void FbxObject::sceneChanged(FbxScene*) {}
+
+FBXSDK_NAMESPACE_END

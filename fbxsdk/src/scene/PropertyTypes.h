@@ -1,0 +1,18 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The table of property types, and which row a file's two type strings mean.
+#pragma once
+
+#include <string_view>
+
+#include <fbxsdk/FbxDataType.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// A blob for type strings that are not in the table: such a property keeps no value.
+[[nodiscard]] FbxDataType dataTypeOf(std::string_view typeName, std::string_view subTypeName);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

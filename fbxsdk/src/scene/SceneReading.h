@@ -1,0 +1,22 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A document becomes a scene: one small reader per object class.
+#pragma once
+
+#include <memory>
+
+#include <fbxsdk/FbxStatus.h>
+
+#include "document/Document.h"
+
+FBXSDK_NAMESPACE_BEGIN
+class FbxScene;
+namespace detail {
+
+/// Adds everything the document holds to the scene. The scene keeps the document alive: geometry is read from it on
+/// first use.
+bool readScene(const std::shared_ptr<const Document>& document, FbxScene& scene, FbxStatus& status);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,69 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What a host calls: each operation opens one FBX file, takes from it what was asked for and closes it again.
+#pragma once
+
+#include "TnFbxExport.h"
+
+#include <string>
+#include <vector>
+
+namespace Tarnell::Fbx {
+
+class FbxSdk;
+class TnFbxCamera;
+class TnFbxLight;
+class TnFbxMarker;
+class TnFbxMesh;
+class TnFbxNull;
+class TnFbxReadInfo;
+class TnFbxTransform;
+
+/// The facade. It has no state: any number of threads may call any number of facades.
+///
+/// Where a bool is returned, false is a failure, and `lastError()` says why.
+class TARNELL_FBX_API Fbx {
+public:
+    Fbx();
+    ~Fbx();
+    Fbx(const Fbx& other) = default;
+    Fbx& operator=(const Fbx& other);
+
+    /// Loads a file into a context of the caller's, with NURBS and patches turned into meshes. After a failure the
+    /// context is not initialised any more.
+    bool loadScene(const std::string& fileName, FbxSdk& sdk) const;
+
+    /// How many objects a read yields: `count`, the number of candidates, when all are asked for; otherwise 1 when a
+    /// node of the kind has exactly the name, else 0. A negative count gives 0.
+    int getNumberOfObjects(int count, bool allObjects, int nodeTypeMask, const std::string& objectName,
+                           FbxSdk& sdk) const;
+
+    /// Replaces both lists: by the names of the file's animation stacks, and by those of its nodes of the kinds in the
+    /// mask (meshes 4, cameras 32, lights 64, markers 1, nulls 0x4000, transforms 0x4005).
+    bool getAnimationStackNodeNames(const char* fileName, long nodeTypeMask, std::vector<std::string>& stackNames,
+                                    std::vector<std::string>& nodeNames) const;
+
+    /// The time between the first and the last key of the file, in seconds although the name says frames. False also
+    /// when nothing in it is animated.
+    bool getAnimationFrameRange(const char* fileName, float& start, float& end) const;
+
+    // The readers: every object of a kind in the file, or the one named by `info.getObjectName()`.
+    //
+    // `*objects` receives an array of `count` objects, parents before their children; null when `count` is 0, which is
+    // a success. The caller owns it and releases it with `delete[]`, also after a failure.
+    // False when `objects` is null (`count` is untouched then), when `info` names no animation stack or no file, and
+    // when the file cannot be read. The first stack of the file is read, whatever the name.
+
+    bool getMeshes(TnFbxReadInfo& info, TnFbxMesh** objects, int& count) const;
+    /// The seven producer cameras come first; a file that has none gets them.
+    bool getCameras(TnFbxReadInfo& info, TnFbxCamera** objects, int& count) const;
+    bool getLights(TnFbxReadInfo& info, TnFbxLight** objects, int& count) const;
+    bool getMarkers(TnFbxReadInfo& info, TnFbxMarker** objects, int& count) const;
+    /// NURBS surfaces are counted but not read: as many objects at the end of the array stay as they were made.
+    bool getNulls(TnFbxReadInfo& info, TnFbxNull** objects, int& count) const;
+    /// Nulls, markers and meshes; NURBS surfaces as with `getNulls`.
+    bool getTransforms(TnFbxReadInfo& info, TnFbxTransform** objects, int& count) const;
+};
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,296 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The adapter between the value classes and the FBX platform: one manager with one scene, loaded, walked and read.
+// Hosts reach it through `Fbx`, which makes one for every call.
+#pragma once
+
+#include "TnFbxCamera.h"
+#include "TnFbxExport.h"
+#include "TnFbxLight.h"
+#include "TnFbxMarker.h"
+#include "TnFbxMesh.h"
+#include "TnFbxNull.h"
+#include "TnFbxReadInfo.h"
+#include "TnFbxTime.h"
+#include "TnFbxTransform.h"
+
+#include <fbxsdk.h>
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+namespace Tarnell::Fbx {
+
+namespace detail {
+class PropertySampler;
+}
+
+/// One scene and what can be read from it.
+///
+/// The order of calls is `initFbxSdkManager`, `loadScene`, any number of queries, `destroyFbxSdkManager`; the destructor
+/// makes up for a missing last one. A context belongs to one thread at a time; contexts share nothing.
+///
+/// An operation whose result is a success or a failure sets `lastError()`; one whose false is an answer (a walk that
+/// found nothing, a mesh without deformers) leaves it alone. Scene objects are passed as pointers of the platform and
+/// stay the scene's.
+class TARNELL_FBX_API FbxSdk {
+public:
+    static const std::string kMayaVertexCacheFileExtension; ///< ".xml"
+    static const std::string kMaxVertexCacheFileExtension;  ///< ".pc2"
+    static const std::string kDefaultAnimationStackName;    ///< "Take 001"
+
+    /// No manager and no scene.
+    FbxSdk();
+    /// Destroys the manager and with it everything that was read.
+    ~FbxSdk();
+
+    FbxSdk(const FbxSdk&) = delete;
+
+    /// Copies nothing: a context that is not initialised yet gets a manager and an empty scene of its own, and one that
+    /// is stays as it is.
+    FbxSdk& operator=(const FbxSdk& other);
+
+    // ---- Manager, scene and loading ----
+
+    /// A manager with one empty scene; true at once when there is one already. False when there is no manager to be had.
+    bool initFbxSdkManager();
+
+    /// False when the context is not initialised.
+    bool destroyFbxSdkManager();
+
+    /// A manager and a scene that belong to the caller; this context's own are not touched. When there is no manager to
+    /// be had, `*manager` is null, `*scene` as it was, and the result false.
+    bool initializeSdkObjects(fbxsdk::FbxManager** manager, fbxsdk::FbxScene** scene);
+
+    /// Destroys the manager, if there is one, and sets the pointer to null; always true.
+    bool destroySdkObjects(fbxsdk::FbxManager** manager);
+
+    /// Imports a file into a scene as it is. False when the file cannot be read; the scene may hold a part of it then.
+    bool loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, const std::string& fileName);
+
+    /// Imports a file into the context's scene, converts it to centimetres and to a right-handed system with Y up,
+    /// makes meshes of NURBS and patches if `convertGeometry` says so, and selects the first animation stack.
+    /// A second file adds to the same scene. False when the context is not initialised or the file cannot be read; the
+    /// scene may hold a part of it then.
+    bool loadScene(const std::string& fileName, bool convertGeometry);
+
+    /// The context's scene, null when not initialised.
+    fbxsdk::FbxScene* getScene() const;
+
+    /// Turns every NURBS and patch (below a node) into a mesh; always true.
+    bool convertNurbsAndPatch(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene);
+    bool convertNurbsAndPatchRecursive(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* node);
+
+    // ---- Animation stacks and time ----
+
+    /// Selects the scene's first animation stack and gives it a layer, making what is missing ("Take 001",
+    /// "Default Layer").
+    void initCreateAnimationStack();
+
+    /// Selects the animation stack of exactly that name; false when there is none, and the selection stays.
+    bool setCurrentAnimationStack(const std::string& name);
+
+    /// Replaces `names` by the names of all animation stacks, in the scene's order. False without a scene.
+    bool getAnimationStackNames(std::vector<std::string>& names);
+
+    /// The current frame as given, the first and last frame of the current stack's time span, and the rate: the scene's
+    /// own, or, with `useSampleFPS` and a rate above 0, `sampleFPS`, to which the frames are converted.
+    /// False without a context or scene; `time` is a new record then.
+    bool getGlobalAnimationStackTime(TnFbxTime& time, float frame, bool useSampleFPS, float sampleFPS);
+
+    // ---- Counting and naming: `mask` selects kinds of nodes ----
+    //
+    // Meshes 4, cameras 32, lights 64, markers 1, nulls 0x4000, transforms 0x4005. The root node is never counted,
+    // named or read. Whatever asks for cameras makes the seven producer cameras of a scene that has none.
+
+    /// How many nodes below the root the mask selects; 0 without a context or scene.
+    int getNumberOfNodeTypes(int mask) const;
+    int getNumberOfMeshes() const;
+    int getNumberOfCameras() const; ///< The producer cameras included.
+    int getNumberOfLights() const;
+    int getNumberOfMarkers() const;
+    int getNumberOfNulls() const;      ///< NURBS surfaces included, which `getNulls` does not read.
+    int getNumberOfTransforms() const; ///< NURBS surfaces included, which `getTransforms` does not read.
+
+    /// Adds the number of selected nodes at and below a node to `count`; always true.
+    bool getNumberOfNodeTypesRecursive(fbxsdk::FbxNode* node, int mask, int& count) const;
+
+    /// Replaces `names` by the names of the selected nodes: producer cameras first, then parents before their children.
+    /// Duplicates are kept. False without a scene.
+    bool getNodeNames(long mask, std::vector<std::string>& names);
+
+    /// Appends the names at and below a node; always true.
+    bool getNodeNamesRecursive(fbxsdk::FbxNode* node, long mask, std::vector<std::string>& names);
+
+    /// The time between the first and the last key of the scene, in seconds although the name says frames; in a scene
+    /// without keys, the time that its Maya point caches cover.
+    /// False without a root node, the outputs untouched then; false also when nothing is animated, `start` then being
+    /// the largest float and `end` its negative.
+    bool getAnimationFrameRange(float& start, float& end);
+
+    /// Widens `start` and `end` (seconds) by the Maya point caches at and below a node; whether there were any.
+    bool getAnimationFrameRangeRecursive(fbxsdk::FbxNode* node, float& start, float& end);
+
+    // ---- Reading all objects of a kind ----
+    //
+    // Each fills an array of `count` objects, parents before their children, or only its first element when `info` asks
+    // for a single name. False for a null array, a count below 1, without a context or scene, and when there are more
+    // objects than elements; what was filled until then stays. Elements without an object stay as they are.
+    //
+    // Animated channels get one sample for every whole frame. A channel of more than `kMaxSamplesPerChannel` frames
+    // gets its static value only, and so does every channel once a list holds `kMaxSamplesPerList` samples.
+
+    static constexpr std::int64_t kMaxSamplesPerChannel = std::int64_t{1} << 24;
+    static constexpr std::int64_t kMaxSamplesPerList = std::int64_t{1} << 29;
+
+    bool getMeshes(TnFbxReadInfo& info, TnFbxMesh* meshes, int count);
+    bool getCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count); ///< The producer cameras first.
+    bool getLights(TnFbxReadInfo& info, TnFbxLight* lights, int count);
+    bool getMarkers(TnFbxReadInfo& info, TnFbxMarker* markers, int count);
+    bool getNulls(TnFbxReadInfo& info, TnFbxNull* nulls, int count);
+    bool getTransforms(TnFbxReadInfo& info, TnFbxTransform* transforms, int count);
+
+    // The same for one node and what is below it. `index` is the next free element of the array and `count` its length;
+    // `found` says that the single object was read and ends the walk.
+
+    bool getMeshesRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS, bool allObjects,
+                            bool transformPoints, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
+                            TnFbxMesh* meshes, int count, bool& found);
+    bool getCamerasRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
+                             bool computeCameraRotation, bool allObjects, const std::string& objectName,
+                             fbxsdk::FbxNode* node, int& index, TnFbxCamera* cameras, int count, bool& found);
+    bool getLightsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS, bool allObjects,
+                            const std::string& objectName, fbxsdk::FbxNode* node, int& index, TnFbxLight* lights,
+                            int count, bool& found);
+    bool getMarkersRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS, bool allObjects,
+                             const std::string& objectName, fbxsdk::FbxNode* node, int& index, TnFbxMarker* markers,
+                             int count, bool& found);
+    bool getNullsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS, bool allObjects,
+                           const std::string& objectName, fbxsdk::FbxNode* node, int& index, TnFbxNull* nulls,
+                           int count, bool& found);
+    bool getTransformsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
+                                bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
+                                TnFbxTransform* transforms, int count, bool& found);
+
+    /// One producer camera into the array: the element at `index`, which moves on, or, for a read by name, the first
+    /// element if the names are equal. `index` is not compared with the array's length. False when the camera, its node
+    /// or the array is null.
+    bool getProducerCamera(fbxsdk::FbxCamera* camera, TnFbxReadInfo& info, TnFbxCamera* cameras, const char* name,
+                           int& index);
+
+    // ---- Reading one node ----
+    //
+    // `time` is the range to sample, `global` asks for transforms in the world, and with `useSampleFPS` the key frames
+    // are converted to `sampleFPS`. `geometric` is the node's geometric transform. False for a null node and for one
+    // without the attribute that the object is read from; the object keeps what was set before. Channels that the scene
+    // says nothing about keep what they held.
+
+    bool getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
+                      TnFbxTransform& transform, fbxsdk::FbxAMatrix& geometric);
+    bool getLight(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
+                  TnFbxLight& light, fbxsdk::FbxAMatrix& geometric);
+    bool getMarker(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
+                   TnFbxMarker& marker, fbxsdk::FbxAMatrix& geometric);
+    /// A node without an attribute is a null of the default size.
+    bool getNull(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
+                 TnFbxNull& null, fbxsdk::FbxAMatrix& geometric);
+
+    /// The camera's own placement is always local; `global` concerns its target. With `useInterestPosition` a camera
+    /// without a target looks at its interest position. A camera that looks at something gets its rotation from that.
+    bool getCamera(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, bool useInterestPosition,
+                   fbxsdk::FbxNode* node, TnFbxCamera& camera, fbxsdk::FbxAMatrix& geometric);
+
+    /// A producer camera, static values only, called `name`; `node` may be null. False for a null camera.
+    bool getProducerCamera(fbxsdk::FbxNode* node, fbxsdk::FbxCamera* camera, TnFbxCamera& out, const char* name);
+
+    /// The mesh at `time.getFrame()`, deformed. With `transformPoints` points and normals are multiplied by the node's
+    /// transform, and, unless `global`, by `geometric`. False also for a mesh without polygons or points.
+    /// Throws std::runtime_error when a layer element has no direct array; the mesh is partly filled then.
+    bool getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
+                 bool transformPoints, TnFbxMesh& mesh, fbxsdk::FbxAMatrix& geometric);
+
+    /// Widens the range by that of `time`, takes its rate and sets `found`.
+    void getCameraFrameRange(TnFbxTime time, bool& found, float& frameRate, int& startFrame, int& endFrame);
+
+    // ---- Transforms ----
+
+    /// Position, rotation (degrees) and scale in the world, one value per frame of `time`. Lights that shine along an
+    /// axis are turned by −90° about X. A range over the sampling limits gives the values of its first frame alone.
+    /// False, with empty vectors, when the range is empty or the node null.
+    bool getGlobalPositionRotationScaleValues(TnFbxTime& time, fbxsdk::FbxNode* node, fbxsdk::FbxAMatrix& geometric,
+                                              std::vector<float>& positionX, std::vector<float>& positionY,
+                                              std::vector<float>& positionZ, std::vector<float>& rotationX,
+                                              std::vector<float>& rotationY, std::vector<float>& rotationZ,
+                                              std::vector<float>& scaleX, std::vector<float>& scaleY,
+                                              std::vector<float>& scaleZ);
+
+    /// Euler angles in degrees of a rotation matrix without scale; always true.
+    bool extractMatrixRotation(fbxsdk::FbxAMatrix matrix, float& x, float& y, float& z);
+
+    /// The node's local translation, rotation and scaling, static and sampled; always true.
+    bool setTransformValues(fbxsdk::FbxNode* node, TnFbxTime& time, bool useSampleFPS, float sampleFPS,
+                            TnFbxTransform* transform);
+
+    /// The rotation orders of FBX and of the library; what is out of range gives ZXY.
+    TnFbxTransform::EFbxTransformRotationOrder getRotationOrderConstant(fbxsdk::FbxEuler::EOrder order);
+    fbxsdk::FbxEuler::EOrder getRotationOrderConstant(TnFbxTransform::EFbxTransformRotationOrder order);
+
+    /// The node's geometric offset; always true.
+    bool getGeometricTransformation(fbxsdk::FbxNode* node, fbxsdk::FbxVector4& translation,
+                                    fbxsdk::FbxVector4& rotation, fbxsdk::FbxVector4& scaling);
+    fbxsdk::FbxAMatrix getGeometry(fbxsdk::FbxNode* node);
+
+    /// The default values of the curves of the node's local transform on the layers of the current stack; components
+    /// without a curve stay as they are. False without a node or a current stack.
+    bool getDefaultAnimTransformation(fbxsdk::FbxNode* node, fbxsdk::FbxVector4& translation,
+                                      fbxsdk::FbxVector4& rotation, fbxsdk::FbxVector4& scaling);
+
+    // ---- Deformation ----
+
+    /// Whether the mesh has an active vertex cache, a shape or a cluster.
+    bool getDeformation(fbxsdk::FbxMesh* mesh);
+
+    /// Stores a new array with the deformed control points, in the mesh's own space, in `*points`, and releases the one
+    /// that was there; the caller owns the array and releases it with `delete[]`. Nothing changes when an argument is
+    /// null or the mesh has no points. `globalPosition` is the mesh's place in the world, for its skin.
+    void getDeformedControlPoints(fbxsdk::FbxNode* node, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
+                                  fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxVector4** points);
+
+    // The three kinds of deformation, each on an array with one element per control point. A cache that cannot be read
+    // leaves the points alone; its file must be open.
+    void readVertexCacheData(fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time, fbxsdk::FbxVector4* points);
+    void computeShapeDeformation(fbxsdk::FbxNode* node, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
+                                 fbxsdk::FbxVector4* points);
+    void computeClusterDeformation(fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
+                                   fbxsdk::FbxVector4* points);
+
+    /// Opens (or closes) the file of every active vertex cache; one that does not open is switched off. False for a
+    /// null scene.
+    bool openClosePointCacheData(fbxsdk::FbxScene* scene, bool open);
+
+    // On the sixteen elements of a matrix.
+    void matrixScale(fbxsdk::FbxAMatrix& matrix, double factor);
+    void matrixAddToDiagonal(fbxsdk::FbxAMatrix& matrix, double value);
+    void matrixAdd(fbxsdk::FbxAMatrix& matrix, fbxsdk::FbxAMatrix& other);
+
+private:
+    template <class Object>
+    bool readList(TnFbxReadInfo& info, Object* objects, int count);
+    bool readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count, int& index);
+    bool getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node, TnFbxCamera& camera,
+                         fbxsdk::FbxAMatrix& geometric, detail::PropertySampler& sampler);
+    void setLookAtRotation(TnFbxCamera& camera);
+    void setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& source,
+                          const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh);
+    detail::PropertySampler sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS);
+
+    bool mInitialized = false;
+    fbxsdk::FbxManager* mManager = nullptr; // owned
+    fbxsdk::FbxScene* mScene = nullptr;     // the manager's
+    fbxsdk::FbxAnimStack* mCurrentAnimStack = nullptr;
+    std::int64_t mSamplesLeft; // of a list's share; without an end outside of lists
+};
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,204 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A mesh at one frame: layout, points, and what its layers say about every corner of its polygons.
+#include "FbxSdk.h"
+
+#include "LastError.h"
+#include "LayerReading.h"
+#include "PropertySampling.h"
+
+#include <array>
+#include <limits>
+#include <memory>
+#include <string>
+
+namespace Tarnell::Fbx {
+
+using detail::channelAfter;
+using detail::Corner;
+using detail::fail;
+using detail::succeed;
+using detail::toFloat;
+
+namespace {
+
+/// What points and normals are multiplied by.
+struct BakeMatrices {
+    fbxsdk::FbxAMatrix points;
+    fbxsdk::FbxAMatrix normals; // the rotation alone
+};
+
+fbxsdk::FbxVector4 vectorAt(const TnFbxTransform& transform, TnFbxTransform::EFbxTransformChannelType firstChannel,
+                            bool animated, float frame) {
+    std::array<double, 3> value{};
+    for (int i = 0; i < 3; ++i) {
+        const auto channel = channelAfter(firstChannel, i);
+        value[static_cast<std::size_t>(i)] = static_cast<double>(
+            animated ? transform.getTransformValueAt(channel, frame) : transform.getTransformValue(channel));
+    }
+    return {value[0], value[1], value[2]};
+}
+
+/// kept: points read in the world leave the geometric transform out, which is in the world transform already
+BakeMatrices bakeMatrices(const TnFbxTransform& transform, bool atFrame, float frame, bool global,
+                          const fbxsdk::FbxAMatrix& geometric) {
+    BakeMatrices bake;
+    bake.points.SetTRS(vectorAt(transform, TnFbxTransform::kFbxTransformPositionX, atFrame, frame),
+                       vectorAt(transform, TnFbxTransform::kFbxTransformRotationX, atFrame, frame),
+                       vectorAt(transform, TnFbxTransform::kFbxTransformScaleX, atFrame, frame));
+    if (!global) {
+        bake.points = bake.points * geometric;
+    }
+    bake.normals.SetTRS(fbxsdk::FbxVector4(0.0, 0.0, 0.0, 1.0), bake.points.GetR(),
+                        fbxsdk::FbxVector4(1.0, 1.0, 1.0, 1.0));
+    return bake;
+}
+
+std::int64_t polygonVertexCount(const fbxsdk::FbxMesh& source) {
+    std::int64_t count = 0;
+    for (int polygon = 0; polygon < source.GetPolygonCount(); ++polygon) {
+        count += source.GetPolygonSize(polygon);
+    }
+    return count;
+}
+
+/// Calls `visit(corner)` for every vertex of every polygon, in order.
+template <class Visit>
+void forEachCorner(const fbxsdk::FbxMesh& source, Visit&& visit) {
+    const int* vertices = source.GetPolygonVertices();
+    int polygonVertex = 0;
+    const int polygonCount = source.GetPolygonCount();
+    for (int polygon = 0; polygon < polygonCount; ++polygon) {
+        const int size = source.GetPolygonSize(polygon);
+        const int start = source.GetPolygonVertexIndex(polygon);
+        for (int vertex = 0; vertex < size; ++vertex) {
+            const int controlPoint = vertices != nullptr && start >= 0 ? vertices[start + vertex] : -1;
+            visit(Corner{polygon, vertex, polygonVertex++, controlPoint});
+        }
+    }
+}
+
+void fillLayout(const fbxsdk::FbxMesh& source, TnFbxMesh& mesh) {
+    for (int polygon = 0; polygon < source.GetPolygonCount(); ++polygon) {
+        mesh.setPolygonVertexSize(polygon, source.GetPolygonSize(polygon));
+    }
+    forEachCorner(source,
+                  [&mesh](const Corner& corner) { mesh.setPointIndex(corner.polygonVertex, corner.controlPoint); });
+}
+
+/// The normals of a layer; whether it has any.
+bool fillNormals(fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh) {
+    const detail::LayerNormals normals(source, layer);
+    const fbxsdk::FbxVector4 missing(
+        static_cast<double>(TnFbxMesh::kDefaultMeshNX), static_cast<double>(TnFbxMesh::kDefaultMeshNY),
+        static_cast<double>(TnFbxMesh::kDefaultMeshNZ));
+    bool found = false;
+    forEachCorner(source, [&](const Corner& corner) {
+        const std::optional<fbxsdk::FbxVector4> stored = normals.at(corner);
+        found = found || stored.has_value();
+        fbxsdk::FbxVector4 normal = stored.value_or(missing);
+        if (bake != nullptr) {
+            normal = bake->MultT(normal);
+        }
+        mesh.setNormal(corner.polygonVertex, toFloat(normal[0]), toFloat(normal[1]), toFloat(normal[2]));
+    });
+    return found;
+}
+
+/// The texture coordinates of a layer; whether it has any.
+bool fillUVs(fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, TnFbxMesh& mesh) {
+    const detail::LayerUVs uvs(source, layer);
+    bool found = false;
+    forEachCorner(source, [&](const Corner& corner) {
+        const std::optional<fbxsdk::FbxVector2> uv = uvs.at(corner);
+        found = found || uv.has_value();
+        mesh.setUV(corner.polygonVertex, uv ? toFloat((*uv)[0]) : TnFbxMesh::kDefaultMeshU,
+                   uv ? toFloat((*uv)[1]) : TnFbxMesh::kDefaultMeshV);
+    });
+    return found;
+}
+
+constexpr detail::Colour kDefaultColour = {TnFbxMesh::kDefaultMeshRed, TnFbxMesh::kDefaultMeshGreen,
+                                           TnFbxMesh::kDefaultMeshBlue, TnFbxMesh::kDefaultMeshAlpha};
+
+/// The colours of all layers; whether any has some.
+///
+/// kept: every layer overwrites the ones before it, so the last layer decides, also where it has no colour.
+bool fillColours(fbxsdk::FbxMesh& source, TnFbxMesh& mesh) {
+    const auto materials = detail::materialColours(source, kDefaultColour);
+    bool found = false;
+    for (int i = 0; i < source.GetLayerCount(); ++i) {
+        fbxsdk::FbxLayer* layer = source.GetLayer(i);
+        if (layer == nullptr) {
+            continue;
+        }
+        const detail::LayerColours colours(*layer, materials);
+        forEachCorner(source, [&](const Corner& corner) {
+            const std::optional<detail::Colour> stored = colours.at(corner);
+            found = found || stored.has_value();
+            const detail::Colour colour = stored.value_or(kDefaultColour);
+            mesh.setColour(corner.polygonVertex, colour.red, colour.green, colour.blue, colour.alpha);
+        });
+    }
+    return found;
+}
+
+} // namespace
+
+bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
+                     bool transformPoints, TnFbxMesh& mesh, fbxsdk::FbxAMatrix& geometric) {
+    auto* source = fbxsdk::FbxCast<fbxsdk::FbxMesh>(node != nullptr ? node->GetNodeAttribute() : nullptr);
+    if (source == nullptr) {
+        return fail("no node with a mesh to read");
+    }
+    mesh.setName(node->GetName());
+    if (!getTransform(time, global, useSampleFPS, sampleFPS, node, mesh, geometric)) {
+        return false;
+    }
+    const BakeMatrices bake = bakeMatrices(mesh, transformPoints, time.getFrame(), global, geometric);
+    const fbxsdk::FbxAMatrix* pointBake = transformPoints ? &bake.points : nullptr;
+    const fbxsdk::FbxAMatrix* normalBake = transformPoints ? &bake.normals : nullptr;
+
+    const std::int64_t cornerCount = polygonVertexCount(*source);
+    if (cornerCount > std::numeric_limits<int>::max() ||
+        !mesh.allocateGeometryData(source->GetPolygonCount(), source->GetControlPointsCount(),
+                                   static_cast<int>(cornerCount))) {
+        return fail(std::string("the mesh of \"") + node->GetName() + "\" has no polygons or no points");
+    }
+    setControlPoints(time, *node, *source, pointBake, mesh);
+    fillLayout(*source, mesh);
+    if (fbxsdk::FbxLayer* first = source->GetLayer(0)) {
+        mesh.setValidNormals(fillNormals(*source, *first, normalBake, mesh));
+        mesh.setValidUVs(fillUVs(*source, *first, mesh));
+    }
+    mesh.setValidColours(fillColours(*source, mesh));
+    return succeed();
+}
+
+/// The points at the time's frame, deformed if anything deforms them; a deformer that yields no points leaves them
+/// unset.
+void FbxSdk::setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& source,
+                              const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh) {
+    const fbxsdk::FbxVector4* points = source.GetControlPoints();
+    std::unique_ptr<fbxsdk::FbxVector4[]> deformed;
+    if (getDeformation(&source)) {
+        fbxsdk::FbxTime moment;
+        moment.SetSecondDouble(static_cast<double>(time.getTime()));
+        fbxsdk::FbxAMatrix identity;
+        fbxsdk::FbxVector4* made = nullptr;
+        getDeformedControlPoints(&node, &source, moment, identity, &made);
+        deformed.reset(made);
+        points = made;
+    }
+    if (points == nullptr) {
+        return;
+    }
+    const int count = source.GetControlPointsCount();
+    for (int i = 0; i < count; ++i) {
+        const fbxsdk::FbxVector4 point = bake != nullptr ? bake->MultT(points[i]) : points[i];
+        mesh.setControlPoint(i, toFloat(point[0]), toFloat(point[1]), toFloat(point[2]));
+    }
+}
+
+} // namespace Tarnell::Fbx

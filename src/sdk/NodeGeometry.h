@@ -1,0 +1,26 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Two matrices of a node that reading and deforming both need.
+#pragma once
+
+#include <fbxsdk.h>
+
+namespace Tarnell::Fbx::detail {
+
+/// The node's place in the world, without its geometric offset and without following a target.
+inline fbxsdk::FbxAMatrix globalTransform(fbxsdk::FbxNode& node, const fbxsdk::FbxTime& time) {
+    return node.EvaluateGlobalTransform(time, fbxsdk::FbxNode::eSourcePivot, /*pApplyTarget*/ false,
+                                        /*pForceEval*/ false);
+}
+
+/// The geometric offset as the readers of objects get it.
+inline fbxsdk::FbxAMatrix geometricTransform(const fbxsdk::FbxNode& node) {
+    fbxsdk::FbxAMatrix matrix;
+    matrix.SetTRS(node.GetGeometricTranslation(fbxsdk::FbxNode::eSourcePivot),
+                  node.GetGeometricRotation(fbxsdk::FbxNode::eSourcePivot),
+                  node.GetGeometricScaling(fbxsdk::FbxNode::eSourcePivot));
+    return matrix;
+}
+
+} // namespace Tarnell::Fbx::detail

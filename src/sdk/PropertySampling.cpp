@@ -1,0 +1,116 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The sampler: the sum of a property's curves over all layers of the current stack, frame by frame.
+#include "PropertySampling.h"
+
+#include "FbxSdk.h"
+
+namespace Tarnell::Fbx {
+
+using detail::PropertySampler;
+
+std::vector<fbxsdk::FbxAnimLayer*> detail::layersOf(fbxsdk::FbxAnimStack* stack) {
+    std::vector<fbxsdk::FbxAnimLayer*> layers;
+    if (stack == nullptr) {
+        return layers;
+    }
+    const fbxsdk::FbxCriteria isLayer = fbxsdk::FbxCriteria::ObjectType(fbxsdk::FbxAnimLayer::ClassId);
+    const int count = stack->GetSrcObjectCount(isLayer);
+    for (int i = 0; i < count; ++i) {
+        if (auto* layer = fbxsdk::FbxCast<fbxsdk::FbxAnimLayer>(stack->GetSrcObject(isLayer, i))) {
+            layers.push_back(layer);
+        }
+    }
+    return layers;
+}
+
+PropertySampler::PropertySampler(fbxsdk::FbxScene* scene, fbxsdk::FbxAnimStack* stack, const TnFbxTime& requested,
+                                 bool useSampleRate, float sampleRate, std::int64_t& samplesLeft)
+    : mLayers(layersOf(stack)),
+      mTimeMode(scene != nullptr ? scene->GetGlobalSettings().GetTimeMode() : fbxsdk::FbxTime::eDefaultMode),
+      mRate(toFloat(fbxsdk::FbxTime::GetFrameRate(mTimeMode))), mRequested(requested),
+      mConvert(useSampleRate && sampleRate > 0.0f), mSampleRate(sampleRate), mSamplesLeft(samplesLeft) {}
+
+void PropertySampler::collectCurves(const fbxsdk::FbxProperty& property, const char* component) {
+    mCurves.clear();
+    fbxsdk::FbxProperty animated = property;
+    const fbxsdk::FbxString name = property.GetName();
+    for (fbxsdk::FbxAnimLayer* layer : mLayers) {
+        if (fbxsdk::FbxAnimCurve* curve = animated.GetCurve(layer, name, component, /*pCreate*/ false)) {
+            mCurves.push_back(curve);
+        }
+    }
+}
+
+detail::SampleRange PropertySampler::keyedRange() const {
+    SampleRange range;
+    for (fbxsdk::FbxAnimCurve* curve : mCurves) {
+        const int keyCount = curve->KeyGetCount();
+        if (keyCount < 1) {
+            continue;
+        }
+        int first = narrowFrame(curve->KeyGetTime(0).GetFrameCount(mTimeMode));
+        int last = narrowFrame(curve->KeyGetTime(keyCount - 1).GetFrameCount(mTimeMode));
+        if (mConvert) {
+            first = convertFrame(first, mRate, mSampleRate);
+            last = convertFrame(last, mRate, mSampleRate);
+        }
+        range.include(std::min(first, mRequested.getStartFrame()), std::max(last, mRequested.getEndFrame()));
+    }
+    return range;
+}
+
+// kept: seconds are counted at the scene's rate also when the frames were converted to another one
+float PropertySampler::valueAt(std::int64_t frame) const {
+    fbxsdk::FbxTime time;
+    time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(mRate));
+    float value = 0.0f;
+    for (fbxsdk::FbxAnimCurve* curve : mCurves) {
+        value += curve->Evaluate(time);
+    }
+    return value;
+}
+
+bool PropertySampler::sample(const fbxsdk::FbxProperty& property, const char* component) {
+    mTime.initTime();
+    mSamples.clear();
+    collectCurves(property, component);
+    const SampleRange range = keyedRange();
+    if (!range.isAnimation()) {
+        return false;
+    }
+
+    const std::int64_t count = frameCount(range.first, range.last);
+    const bool keyed = count > 0;
+    if (keyed) {
+        if (!takeSamples(mSamplesLeft, count, /*channelCount*/ 1)) {
+            return false;
+        }
+        mSamples.reserve(static_cast<std::size_t>(count));
+        for (std::int64_t frame = range.first; frame <= range.last; ++frame) {
+            mSamples.push_back(valueAt(frame));
+        }
+    }
+    mTime.setTime(0.0f, range.first, range.last, keyed ? mRate : 0.0f);
+    return true;
+}
+
+void PropertySampler::readIntoTransform(TnFbxTransform& transform,
+                                        TnFbxTransform::EFbxTransformChannelType firstChannel,
+                                        const fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property) {
+    const fbxsdk::FbxDouble3 value = property.Get();
+    for (int i = 0; i < 3; ++i) {
+        const auto channel = channelAfter(firstChannel, i);
+        transform.setTransformValue(channel, toFloat(value[i]));
+        if (sample(property, kComponents[i])) {
+            transform.setTransformValueAt(channel, mTime, mSamples);
+        }
+    }
+}
+
+detail::PropertySampler FbxSdk::sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS) {
+    return PropertySampler(mScene, mCurrentAnimStack, time, useSampleFPS, sampleFPS, mSamplesLeft);
+}
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,103 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// From an animated property of the scene to a channel: its static value, and one sample per whole frame.
+//
+// Everything that reads channels goes through a sampler. It looks up once what all properties of a read share (layers,
+// time mode, rate) and keeps its buffers from one property to the next.
+#pragma once
+
+#include "SampleRange.h"
+
+#include "TnFbxTime.h"
+#include "TnFbxTransform.h"
+
+#include <fbxsdk.h>
+
+#include <cstdint>
+#include <vector>
+
+namespace Tarnell::Fbx::detail {
+
+/// Rounds to the nearest float; what is too large becomes infinite, as IEEE 754 has it.
+inline float toFloat(double value) { return static_cast<float>(value); }
+
+/// The channel some places after another one in its enumeration.
+template <class Channel>
+constexpr Channel channelAfter(Channel channel, int offset) {
+    return static_cast<Channel>(static_cast<int>(channel) + offset);
+}
+
+/// The number that an enumeration property holds, which in a file can be any.
+inline int enumNumber(const fbxsdk::FbxProperty& property) { return property.Get<fbxsdk::FbxEnum>(); }
+
+/// The layers of an animation stack, in order; none of a null stack.
+std::vector<fbxsdk::FbxAnimLayer*> layersOf(fbxsdk::FbxAnimStack* stack);
+
+/// The names under which a vector's components are keyed.
+inline constexpr const char* kComponents[] = {"X", "Y", "Z"};
+
+class PropertySampler {
+public:
+    /// `requested` is the range to cover at least. Key frames are converted to `sampleRate` when `useSampleRate` is set
+    /// and the rate above 0. `samplesLeft` is shared by all samplers of a list.
+    PropertySampler(fbxsdk::FbxScene* scene, fbxsdk::FbxAnimStack* stack, const TnFbxTime& requested,
+                    bool useSampleRate, float sampleRate, std::int64_t& samplesLeft);
+
+    /// Samples one component of a property, or a scalar property when `component` is null; `time` and `samples` hold
+    /// the result until the next call.
+    ///
+    /// False for a range of a single frame, or one over the limits. A property without keys gives true, no samples and
+    /// an inverted range, which no channel accepts.
+    bool sample(const fbxsdk::FbxProperty& property, const char* component);
+
+    const TnFbxTime& time() const { return mTime; }
+    std::vector<float>& samples() { return mSamples; }
+
+    /// Samples straight into a channel of an object, which keeps what it held when there is nothing to store.
+    template <class Object, class Channel>
+    void sampleInto(Object& object, Channel channel, const fbxsdk::FbxProperty& property,
+                    const char* component = nullptr) {
+        if (sample(property, component)) {
+            object.setValueAt(channel, mTime, mSamples);
+        }
+    }
+
+    /// The three components of a vector into three consecutive channels.
+    template <class Object, class Channel>
+    void sampleVectorInto(Object& object, Channel firstChannel, const fbxsdk::FbxProperty& property) {
+        for (int i = 0; i < 3; ++i) {
+            sampleInto(object, channelAfter(firstChannel, i), property, kComponents[i]);
+        }
+    }
+
+    /// Static value and samples of a scalar property.
+    template <class Object, class Channel>
+    void readInto(Object& object, Channel channel, const fbxsdk::FbxPropertyT<fbxsdk::FbxDouble>& property) {
+        object.setValue(channel, toFloat(property.Get()));
+        sampleInto(object, channel, property);
+    }
+
+    /// Static values and samples of a vector into three consecutive channels of a transform.
+    void readIntoTransform(TnFbxTransform& transform, TnFbxTransform::EFbxTransformChannelType firstChannel,
+                           const fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property);
+
+private:
+    void collectCurves(const fbxsdk::FbxProperty& property, const char* component);
+    SampleRange keyedRange() const;
+    float valueAt(std::int64_t frame) const;
+
+    std::vector<fbxsdk::FbxAnimLayer*> mLayers;
+    fbxsdk::FbxTime::EMode mTimeMode;
+    float mRate; // of the scene
+    TnFbxTime mRequested;
+    bool mConvert;
+    float mSampleRate;
+    std::int64_t& mSamplesLeft;
+
+    std::vector<fbxsdk::FbxAnimCurve*> mCurves; // of the component being sampled, with and without keys
+    TnFbxTime mTime;
+    std::vector<float> mSamples;
+};
+
+} // namespace Tarnell::Fbx::detail

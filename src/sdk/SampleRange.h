@@ -1,0 +1,62 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Which frames an animated property is sampled over, as arithmetic on plain numbers.
+#pragma once
+
+#include "model/FrameArithmetic.h"
+
+#include "FbxSdk.h"
+
+#include <algorithm>
+#include <cstdint>
+#include <limits>
+
+namespace Tarnell::Fbx::detail {
+
+/// No limit on the whole: what single nodes are read with, outside of a list.
+inline constexpr std::int64_t kUnlimitedSamples = std::numeric_limits<std::int64_t>::max();
+
+/// a − b, wrapping around in 32 bits.
+constexpr int wrappingSubtract(int a, int b) {
+    return static_cast<int>(static_cast<std::uint32_t>(a) - static_cast<std::uint32_t>(b));
+}
+
+/// The low 32 bits of a frame count; frames that far out come from damaged files only.
+constexpr int narrowFrame(std::int64_t frame) { return static_cast<int>(frame); }
+
+/// The frame of one rate as the frame of another, in single precision, truncated toward zero.
+constexpr int convertFrame(int frame, float rate, float sampleRate) {
+    return truncateToInt(static_cast<float>(frame) / rate * sampleRate);
+}
+
+/// First and last frame. New ranges hold nothing: any frame lowers the first and raises the last.
+struct SampleRange {
+    int first = std::numeric_limits<int>::max();
+    int last = std::numeric_limits<int>::min();
+
+    constexpr void include(int firstFrame, int lastFrame) {
+        first = std::min(first, firstFrame);
+        last = std::max(last, lastFrame);
+    }
+
+    /// Whether there is more than one frame to sample.
+    ///
+    /// kept: the untouched range wraps to a span of 1, so a property without keys counts as sampled, with no samples;
+    /// a range of 2^31 frames and more wraps to a negative span and does not.
+    constexpr bool isAnimation() const { return wrappingSubtract(last, first) > 0; }
+};
+
+/// Takes the samples of some channels over so many frames out of what is left. False, with nothing taken, when that
+/// goes over one of the limits.
+constexpr bool takeSamples(std::int64_t& samplesLeft, std::int64_t frameCount, std::int64_t channelCount) {
+    if (frameCount > FbxSdk::kMaxSamplesPerChannel || frameCount * channelCount > samplesLeft) {
+        return false;
+    }
+    if (samplesLeft != kUnlimitedSamples) {
+        samplesLeft -= frameCount * channelCount;
+    }
+    return true;
+}
+
+} // namespace Tarnell::Fbx::detail

@@ -1,0 +1,487 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Counting, naming and listing: the walks over the node tree, and the time that the scene's animation covers.
+//
+// The six kinds of objects differ by a row: which nodes they are, and what reads one. Everything else is one walk.
+#include "FbxSdk.h"
+
+#include "LastError.h"
+#include "NodeGeometry.h"
+#include "NodeWalk.h"
+#include "PointCacheScope.h"
+#include "PropertySampling.h"
+
+#include <algorithm>
+#include <cstdint>
+#include <iterator>
+#include <limits>
+
+namespace Tarnell::Fbx {
+
+using detail::fail;
+using detail::succeed;
+
+namespace {
+
+using Attribute = fbxsdk::FbxNodeAttribute;
+
+// ---- What a node is: one bit per attribute type, and one for nodes that have none ----
+
+constexpr std::uint32_t bitOf(int attributeType) {
+    return attributeType >= 0 && attributeType < 31 ? std::uint32_t{1} << attributeType : 0;
+}
+constexpr std::uint32_t kNoAttribute = std::uint32_t{1} << 31;
+
+std::uint32_t typeBit(fbxsdk::FbxNode& node) {
+    const Attribute* attribute = node.GetNodeAttribute();
+    return attribute != nullptr ? bitOf(attribute->GetAttributeType()) : kNoAttribute;
+}
+
+/// What the bits of the public mask select. 0x400 selects nothing, and nothing selects stereo cameras.
+struct MaskRow {
+    long maskBit;
+    std::uint32_t types;
+};
+constexpr MaskRow kMaskRows[] = {
+    {0x1, bitOf(Attribute::eMarker)},
+    {0x2, bitOf(Attribute::eSkeleton)},
+    {0x4, bitOf(Attribute::eMesh)},
+    {0x8, bitOf(Attribute::eNurbs)},
+    {0x10, bitOf(Attribute::ePatch)},
+    {0x20, bitOf(Attribute::eCamera)},
+    {0x40, bitOf(Attribute::eLight)},
+    {0x80, bitOf(Attribute::eOpticalReference)},
+    {0x100, bitOf(Attribute::eOpticalMarker)},
+    {0x200, bitOf(Attribute::eCameraSwitcher)},
+    {0x800, bitOf(Attribute::eNurbsCurve)},
+    {0x1000, bitOf(Attribute::eTrimNurbsSurface)},
+    {0x2000, bitOf(Attribute::eBoundary)},
+    {0x4000, kNoAttribute | bitOf(Attribute::eNull) | bitOf(Attribute::eNurbsSurface)}, // kept: surfaces with nulls
+};
+
+constexpr int kMeshMask = 0x4;
+constexpr int kCameraMask = 0x20;
+constexpr int kLightMask = 0x40;
+constexpr int kMarkerMask = 0x1;
+constexpr int kNullMask = 0x4000;
+constexpr int kTransformMask = kNullMask | kMeshMask | kMarkerMask;
+
+std::uint32_t selectedTypes(long mask) {
+    std::uint32_t types = 0;
+    for (const MaskRow& row : kMaskRows) {
+        types |= (mask & row.maskBit) != 0 ? row.types : 0;
+    }
+    return types;
+}
+
+// ---- The producer cameras ----
+
+struct ProducerRow {
+    fbxsdk::FbxCamera* (fbxsdk::FbxGlobalCameraSettings::*camera)() const;
+    const char* name;
+};
+constexpr ProducerRow kProducers[] = {
+    {&fbxsdk::FbxGlobalCameraSettings::GetCameraProducerPerspective, "Producer Perspective"},
+    {&fbxsdk::FbxGlobalCameraSettings::GetCameraProducerTop, "Producer Top"},
+    {&fbxsdk::FbxGlobalCameraSettings::GetCameraProducerBottom, "Producer Bottom"},
+    {&fbxsdk::FbxGlobalCameraSettings::GetCameraProducerFront, "Producer Front"},
+    {&fbxsdk::FbxGlobalCameraSettings::GetCameraProducerBack, "Producer Back"},
+    {&fbxsdk::FbxGlobalCameraSettings::GetCameraProducerRight, "Producer Right"},
+    {&fbxsdk::FbxGlobalCameraSettings::GetCameraProducerLeft, "Producer Left"},
+};
+
+/// Makes the producer cameras unless the scene has one of them already, and hands out its settings.
+fbxsdk::FbxGlobalCameraSettings& ensureProducers(fbxsdk::FbxScene& scene) {
+    fbxsdk::FbxGlobalCameraSettings& settings = scene.GlobalCameraSettings();
+    if (std::none_of(std::begin(kProducers), std::end(kProducers),
+                     [&settings](const ProducerRow& row) { return (settings.*row.camera)() != nullptr; })) {
+        settings.CreateProducerCameras();
+    }
+    return settings;
+}
+
+// ---- The kinds of objects ----
+
+/// How nodes are read, apart from the time.
+struct ReadFlags {
+    bool globalTransform = false;
+    bool useSampleRate = false;
+    float sampleRate = 0.0f;
+    bool computeCameraRotation = false;
+    bool transformPoints = false;
+};
+
+/// Which nodes are objects of a kind, and how one is read.
+template <class Object>
+struct Kind {
+    std::uint32_t types;
+    bool geometricOffset; // whether the node's geometric transform takes part
+    bool (*read)(FbxSdk& sdk, TnFbxTime& time, const ReadFlags& flags, fbxsdk::FbxNode& node, Object& object,
+                 fbxsdk::FbxAMatrix& geometric);
+};
+
+/// Readers whose arguments are the common ones.
+template <class Object, bool (FbxSdk::*kReader)(TnFbxTime&, bool, bool, float, fbxsdk::FbxNode*, Object&,
+                                                fbxsdk::FbxAMatrix&)>
+bool readPlain(FbxSdk& sdk, TnFbxTime& time, const ReadFlags& flags, fbxsdk::FbxNode& node, Object& object,
+               fbxsdk::FbxAMatrix& geometric) {
+    return (sdk.*kReader)(time, flags.globalTransform, flags.useSampleRate, flags.sampleRate, &node, object, geometric);
+}
+
+bool readCamera(FbxSdk& sdk, TnFbxTime& time, const ReadFlags& flags, fbxsdk::FbxNode& node, TnFbxCamera& camera,
+                fbxsdk::FbxAMatrix& geometric) {
+    return sdk.getCamera(time, flags.globalTransform, flags.useSampleRate, flags.sampleRate,
+                         flags.computeCameraRotation, &node, camera, geometric);
+}
+
+bool readMesh(FbxSdk& sdk, TnFbxTime& time, const ReadFlags& flags, fbxsdk::FbxNode& node, TnFbxMesh& mesh,
+              fbxsdk::FbxAMatrix& geometric) {
+    return sdk.getMesh(time, flags.globalTransform, flags.useSampleRate, flags.sampleRate, &node,
+                       flags.transformPoints, mesh, geometric);
+}
+
+template <class Object>
+constexpr Kind<Object> kKind{};
+template <>
+constexpr Kind<TnFbxMesh> kKind<TnFbxMesh> = {bitOf(Attribute::eMesh), true, readMesh};
+template <>
+constexpr Kind<TnFbxCamera> kKind<TnFbxCamera> = {bitOf(Attribute::eCamera), false, readCamera};
+template <>
+constexpr Kind<TnFbxLight> kKind<TnFbxLight> = {bitOf(Attribute::eLight), true,
+                                                readPlain<TnFbxLight, &FbxSdk::getLight>};
+template <>
+constexpr Kind<TnFbxMarker> kKind<TnFbxMarker> = {bitOf(Attribute::eMarker), true,
+                                                  readPlain<TnFbxMarker, &FbxSdk::getMarker>};
+template <>
+constexpr Kind<TnFbxNull> kKind<TnFbxNull> = {kNoAttribute | bitOf(Attribute::eNull), true,
+                                              readPlain<TnFbxNull, &FbxSdk::getNull>};
+template <>
+constexpr Kind<TnFbxTransform> kKind<TnFbxTransform> = {
+    kNoAttribute | bitOf(Attribute::eNull) | bitOf(Attribute::eMarker) | bitOf(Attribute::eMesh), true,
+    readPlain<TnFbxTransform, &FbxSdk::getTransform>};
+
+/// The state of one walk: what to read and where to put it.
+template <class Object>
+struct Walk {
+    TnFbxTime& time;
+    ReadFlags flags;
+    bool allObjects;
+    const std::string& objectName;
+    Object* objects;
+    int capacity;
+    int& index;  // the next free element
+    bool& found; // the object asked for by name was read
+};
+
+template <class Object>
+void readNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node, Object& object) {
+    fbxsdk::FbxAMatrix geometric;
+    if (kKind<Object>.geometricOffset) {
+        geometric = detail::geometricTransform(node);
+    }
+    kKind<Object>.read(sdk, walk.time, walk.flags, node, object, geometric); // the object keeps what a failure left
+}
+
+/// Reads the node if it is of the kind and asked for. False when the array has no room for it.
+template <class Object>
+bool visitNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node) {
+    if ((typeBit(node) & kKind<Object>.types) == 0) {
+        return true;
+    }
+    if (walk.index < 0 || walk.index >= walk.capacity) {
+        return fail(std::string("no room in the array for \"") + node.GetName() + '"');
+    }
+    if (walk.allObjects) {
+        readNode(sdk, walk, node, walk.objects[walk.index]);
+        ++walk.index;
+    } else if (walk.objectName == node.GetName()) {
+        readNode(sdk, walk, node, walk.objects[0]);
+        walk.found = true;
+    }
+    return true;
+}
+
+/// A node and what is below it, as far as there is room and until the object asked for was found.
+template <class Object>
+bool walkSubtree(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode* top) {
+    if (walk.objects == nullptr) {
+        return fail("no array to read into");
+    }
+    bool hasRoom = true;
+    detail::walkNodes(top, [&](fbxsdk::FbxNode& node) {
+        hasRoom = visitNode(sdk, walk, node);
+        return hasRoom && !walk.found;
+    });
+    return hasRoom && succeed();
+}
+
+/// The samples that a list may take; nodes that are read one by one have no such limit.
+class SampleShare {
+public:
+    explicit SampleShare(std::int64_t& samplesLeft) : mSamplesLeft(samplesLeft) {
+        mSamplesLeft = FbxSdk::kMaxSamplesPerList;
+    }
+    ~SampleShare() { mSamplesLeft = detail::kUnlimitedSamples; }
+    SampleShare(const SampleShare&) = delete;
+    SampleShare& operator=(const SampleShare&) = delete;
+
+private:
+    std::int64_t& mSamplesLeft;
+};
+
+} // namespace
+
+// ---- Counting ----
+
+int FbxSdk::getNumberOfNodeTypes(int mask) const {
+    int count = 0;
+    if (mInitialized && mScene != nullptr) {
+        const std::uint32_t types = selectedTypes(mask);
+        detail::walkBelow(mScene->GetRootNode(), [&](fbxsdk::FbxNode& node) {
+            count += (typeBit(node) & types) != 0 ? 1 : 0;
+            return true;
+        });
+    }
+    return count;
+}
+
+bool FbxSdk::getNumberOfNodeTypesRecursive(fbxsdk::FbxNode* node, int mask, int& count) const {
+    const std::uint32_t types = selectedTypes(mask);
+    return detail::walkNodes(node, [&](fbxsdk::FbxNode& visited) {
+        count += (typeBit(visited) & types) != 0 ? 1 : 0;
+        return true;
+    });
+}
+
+int FbxSdk::getNumberOfMeshes() const { return getNumberOfNodeTypes(kMeshMask); }
+int FbxSdk::getNumberOfLights() const { return getNumberOfNodeTypes(kLightMask); }
+int FbxSdk::getNumberOfMarkers() const { return getNumberOfNodeTypes(kMarkerMask); }
+int FbxSdk::getNumberOfNulls() const { return getNumberOfNodeTypes(kNullMask); }
+int FbxSdk::getNumberOfTransforms() const { return getNumberOfNodeTypes(kTransformMask); }
+
+int FbxSdk::getNumberOfCameras() const {
+    if (!mInitialized || mScene == nullptr) {
+        return 0;
+    }
+    const fbxsdk::FbxGlobalCameraSettings& settings = ensureProducers(*mScene);
+    const auto producerCount =
+        std::count_if(std::begin(kProducers), std::end(kProducers),
+                      [&settings](const ProducerRow& row) { return (settings.*row.camera)() != nullptr; });
+    return static_cast<int>(producerCount) + getNumberOfNodeTypes(kCameraMask);
+}
+
+// ---- Naming ----
+
+bool FbxSdk::getNodeNames(long mask, std::vector<std::string>& names) {
+    names.clear();
+    if (mScene == nullptr) {
+        return fail("no scene is loaded");
+    }
+    if ((mask & kCameraMask) != 0) {
+        const fbxsdk::FbxGlobalCameraSettings& settings = ensureProducers(*mScene);
+        for (const ProducerRow& row : kProducers) {
+            if ((settings.*row.camera)() != nullptr) {
+                names.emplace_back(row.name);
+            }
+        }
+    }
+    fbxsdk::FbxNode* root = mScene->GetRootNode();
+    for (int i = 0; root != nullptr && i < root->GetChildCount(); ++i) {
+        getNodeNamesRecursive(root->GetChild(i), mask, names);
+    }
+    return succeed();
+}
+
+bool FbxSdk::getNodeNamesRecursive(fbxsdk::FbxNode* node, long mask, std::vector<std::string>& names) {
+    const std::uint32_t types = selectedTypes(mask);
+    return detail::walkNodes(node, [&](fbxsdk::FbxNode& visited) {
+        if ((typeBit(visited) & types) != 0) {
+            names.emplace_back(visited.GetName());
+        }
+        return true;
+    });
+}
+
+// ---- Listing ----
+
+template <class Object>
+bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
+    if (objects == nullptr || count < 1) {
+        return fail("no array to read into");
+    }
+    if (!mInitialized || mScene == nullptr) {
+        return fail("no scene is loaded");
+    }
+    const SampleShare share(mSamplesLeft);
+    TnFbxTime time;
+    getGlobalAnimationStackTime(time, info.getFrame(), info.getUseSampleFPS(), info.getSampleFPS());
+    int index = 0;
+    if constexpr (std::is_same_v<Object, TnFbxCamera>) {
+        if (!readProducerCameras(info, objects, count, index)) {
+            return false;
+        }
+    }
+
+    const detail::PointCacheScope caches(*this, std::is_same_v<Object, TnFbxMesh> ? mScene : nullptr);
+    bool found = false;
+    const ReadFlags flags = {info.getGlobalTransform(), info.getUseSampleFPS(), info.getSampleFPS(),
+                             info.getComputeCameraRotation(), info.getTransformPoints()};
+    const Walk<Object> walk = {time,    flags, info.getAllObjects(), info.getObjectName(),
+                               objects, count, index,                found};
+    bool result = succeed();
+    fbxsdk::FbxNode* root = mScene->GetRootNode();
+    for (int i = 0; root != nullptr && result && !found && i < root->GetChildCount(); ++i) {
+        result = walkSubtree(*this, walk, root->GetChild(i));
+    }
+    return result;
+}
+
+bool FbxSdk::getMeshes(TnFbxReadInfo& info, TnFbxMesh* meshes, int count) { return readList(info, meshes, count); }
+bool FbxSdk::getCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count) { return readList(info, cameras, count); }
+bool FbxSdk::getLights(TnFbxReadInfo& info, TnFbxLight* lights, int count) { return readList(info, lights, count); }
+bool FbxSdk::getMarkers(TnFbxReadInfo& info, TnFbxMarker* markers, int count) { return readList(info, markers, count); }
+bool FbxSdk::getNulls(TnFbxReadInfo& info, TnFbxNull* nulls, int count) { return readList(info, nulls, count); }
+bool FbxSdk::getTransforms(TnFbxReadInfo& info, TnFbxTransform* transforms, int count) {
+    return readList(info, transforms, count);
+}
+
+/// False when the array ends before the producer cameras do, which an array of `getNumberOfCameras` elements never does.
+bool FbxSdk::readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count, int& index) {
+    const fbxsdk::FbxGlobalCameraSettings& settings = ensureProducers(*mScene);
+    for (const ProducerRow& row : kProducers) {
+        fbxsdk::FbxCamera* camera = (settings.*row.camera)();
+        if (camera == nullptr) {
+            continue;
+        }
+        if (index >= count) {
+            return fail(std::string("no room in the array for \"") + row.name + '"');
+        }
+        getProducerCamera(camera, info, cameras, row.name, index);
+    }
+    return true;
+}
+
+bool FbxSdk::getProducerCamera(fbxsdk::FbxCamera* camera, TnFbxReadInfo& info, TnFbxCamera* cameras, const char* name,
+                               int& index) {
+    if (camera == nullptr || cameras == nullptr || name == nullptr) {
+        return fail("no producer camera, or no array to read it into");
+    }
+    fbxsdk::FbxNode* node = camera->GetNode(0);
+    if (node == nullptr) {
+        return fail(std::string("\"") + name + "\" stands on no node");
+    }
+    if (info.getAllObjects()) {
+        getProducerCamera(node, camera, cameras[index], name);
+        ++index;
+    } else if (info.getObjectName() == name) {
+        getProducerCamera(node, camera, cameras[0], name); // kept: a camera of that name in the scene overwrites it
+    }
+    return succeed();
+}
+
+bool FbxSdk::getMeshesRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
+                                bool allObjects, bool transformPoints, const std::string& objectName,
+                                fbxsdk::FbxNode* node, int& index, TnFbxMesh* meshes, int count, bool& found) {
+    const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, transformPoints};
+    return walkSubtree<TnFbxMesh>(*this, {time, flags, allObjects, objectName, meshes, count, index, found}, node);
+}
+
+bool FbxSdk::getCamerasRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
+                                 bool computeCameraRotation, bool allObjects, const std::string& objectName,
+                                 fbxsdk::FbxNode* node, int& index, TnFbxCamera* cameras, int count, bool& found) {
+    const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, computeCameraRotation, false};
+    return walkSubtree<TnFbxCamera>(*this, {time, flags, allObjects, objectName, cameras, count, index, found}, node);
+}
+
+bool FbxSdk::getLightsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
+                                bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
+                                TnFbxLight* lights, int count, bool& found) {
+    const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
+    return walkSubtree<TnFbxLight>(*this, {time, flags, allObjects, objectName, lights, count, index, found}, node);
+}
+
+bool FbxSdk::getMarkersRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
+                                 bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
+                                 TnFbxMarker* markers, int count, bool& found) {
+    const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
+    return walkSubtree<TnFbxMarker>(*this, {time, flags, allObjects, objectName, markers, count, index, found}, node);
+}
+
+bool FbxSdk::getNullsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
+                               bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
+                               TnFbxNull* nulls, int count, bool& found) {
+    const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
+    return walkSubtree<TnFbxNull>(*this, {time, flags, allObjects, objectName, nulls, count, index, found}, node);
+}
+
+bool FbxSdk::getTransformsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
+                                    bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
+                                    TnFbxTransform* transforms, int count, bool& found) {
+    const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
+    return walkSubtree<TnFbxTransform>(*this, {time, flags, allObjects, objectName, transforms, count, index, found},
+                                       node);
+}
+
+// ---- The time that animation covers ----
+
+namespace {
+
+/// The deformer's Maya cache; null when it has none.
+fbxsdk::FbxCache* mayaCacheOf(fbxsdk::FbxMesh& mesh) {
+    auto* deformer = fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(
+        mesh.GetDeformer(0, fbxsdk::FbxDeformer::eVertexCache));
+    fbxsdk::FbxCache* cache = deformer != nullptr ? deformer->GetCache() : nullptr;
+    return cache != nullptr && cache->GetCacheFileFormat() == fbxsdk::FbxCache::eMayaCache ? cache : nullptr;
+}
+
+/// Widens the range by every channel of the cache; whether one of them has a range.
+bool widenByChannels(fbxsdk::FbxCache& cache, float& start, float& end) {
+    bool found = false;
+    const int channelCount = cache.GetChannelCount();
+    for (int i = 0; i < channelCount; ++i) {
+        fbxsdk::FbxTime first, last;
+        if (cache.GetAnimationRange(i, first, last)) {
+            start = std::min(detail::toFloat(first.GetSecondDouble()), start);
+            end = std::max(detail::toFloat(last.GetSecondDouble()), end);
+            found = true;
+        }
+    }
+    return found;
+}
+
+} // namespace
+
+bool FbxSdk::getAnimationFrameRange(float& start, float& end) {
+    fbxsdk::FbxNode* root = mScene != nullptr ? mScene->GetRootNode() : nullptr;
+    if (root == nullptr) {
+        return fail("the scene has no root node");
+    }
+    fbxsdk::FbxTimeSpan span(fbxsdk::FBXSDK_TIME_INFINITE, fbxsdk::FBXSDK_TIME_MINUS_INFINITE);
+    if (root->GetAnimationInterval(span, /*pAnimStack: the current one*/ nullptr, /*pAnimLayerId*/ 0)) {
+        start = detail::toFloat(span.GetStart().GetSecondDouble()); // kept: seconds, although the name says frames
+        end = detail::toFloat(span.GetStop().GetSecondDouble());
+        return succeed();
+    }
+
+    start = std::numeric_limits<float>::max();
+    end = -start;
+    const detail::PointCacheScope caches(*this, mScene);
+    return getAnimationFrameRangeRecursive(root, start, end) ? succeed() : fail("nothing in the scene is animated");
+}
+
+bool FbxSdk::getAnimationFrameRangeRecursive(fbxsdk::FbxNode* node, float& start, float& end) {
+    bool found = false;
+    detail::walkNodes(node, [&](fbxsdk::FbxNode& visited) {
+        fbxsdk::FbxMesh* mesh = visited.GetMesh();
+        if (mesh != nullptr && getDeformation(mesh)) {
+            if (fbxsdk::FbxCache* cache = mayaCacheOf(*mesh)) {
+                found = widenByChannels(*cache, start, end) || found;
+            }
+        }
+        return true;
+    });
+    return found;
+}
+
+} // namespace Tarnell::Fbx

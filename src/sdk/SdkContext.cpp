@@ -1,0 +1,260 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The context: its manager and scene, the loading of a file with the normalisation that every read relies on, and the
+// animation stack with the range of frames to read.
+#include "FbxSdk.h"
+
+#include "LastError.h"
+#include "NodeWalk.h"
+#include "SampleRange.h"
+
+#include "model/FrameArithmetic.h"
+
+namespace Tarnell::Fbx {
+
+using detail::fail;
+using detail::succeed;
+
+const std::string FbxSdk::kMayaVertexCacheFileExtension = ".xml";
+const std::string FbxSdk::kMaxVertexCacheFileExtension = ".pc2";
+const std::string FbxSdk::kDefaultAnimationStackName = "Take 001";
+
+namespace {
+
+constexpr char kDefaultLayerName[] = "Default Layer";
+
+/// What an import is meant to bring in.
+constexpr const char* kImportSettings[] = {
+    "Import|AdvOptGrp|FileFormat|Fbx|Material",        //
+    "Import|AdvOptGrp|FileFormat|Fbx|Texture",         //
+    "Import|AdvOptGrp|FileFormat|Fbx|Link",            //
+    "Import|AdvOptGrp|FileFormat|Fbx|Shape",           //
+    "Import|AdvOptGrp|FileFormat|Fbx|Gobo",            //
+    "Import|AdvOptGrp|FileFormat|Fbx|Animation",       //
+    "Import|AdvOptGrp|FileFormat|Fbx|Global_Settings", //
+};
+
+fbxsdk::FbxAxisSystem targetAxisSystem() {
+    using System = fbxsdk::FbxAxisSystem;
+    return System(System::eYAxis, System::eParityOdd, System::eRightHanded);
+}
+
+/// Names the file, unless the reason does so already.
+std::string reasonFor(const std::string& fileName, const char* reason) {
+    std::string text = reason != nullptr && *reason != '\0' ? reason : "cannot be read";
+    return text.compare(0, fileName.size(), fileName) == 0 ? text : fileName + ": " + text;
+}
+
+/// kept: the settings go to neither the importer nor the manager, so a read always runs with the platform's own
+/// defaults.
+void createImportSettings(fbxsdk::FbxManager* manager) {
+    fbxsdk::FbxIOSettings* settings = fbxsdk::FbxIOSettings::Create(manager, "IOSRoot");
+    for (const char* path : kImportSettings) {
+        settings->SetBoolProp(path, true);
+    }
+}
+
+void convertToCentimetres(fbxsdk::FbxScene& scene) {
+    const double difference = scene.GetGlobalSettings().GetSystemUnit().GetScaleFactor() - 1.0;
+    if (difference < 0.0 || difference > 0.0) { // a unit that is no number is left alone
+        const fbxsdk::FbxSystemUnit centimetre(/*pScaleFactor*/ 1.0, /*pMultiplier*/ 1.0);
+        centimetre.ConvertScene(&scene, fbxsdk::FbxSystemUnit::DefaultConversionOptions);
+    }
+}
+
+void convertToYUp(fbxsdk::FbxScene& scene) {
+    const fbxsdk::FbxAxisSystem target = targetAxisSystem();
+    if (scene.GetGlobalSettings().GetAxisSystem() != target) {
+        target.ConvertScene(&scene);
+    }
+}
+
+fbxsdk::FbxCriteria isStack() { return fbxsdk::FbxCriteria::ObjectType(fbxsdk::FbxAnimStack::ClassId); }
+
+fbxsdk::FbxAnimStack* stackAt(fbxsdk::FbxScene& scene, int index) {
+    return fbxsdk::FbxCast<fbxsdk::FbxAnimStack>(scene.GetSrcObject(isStack(), index));
+}
+
+void triangulate(fbxsdk::FbxManager* manager, fbxsdk::FbxNode& node) {
+    fbxsdk::FbxNodeAttribute* attribute = node.GetNodeAttribute();
+    if (attribute == nullptr) {
+        return;
+    }
+    const auto type = attribute->GetAttributeType();
+    if (type == fbxsdk::FbxNodeAttribute::eNurbs || type == fbxsdk::FbxNodeAttribute::ePatch) {
+        fbxsdk::FbxGeometryConverter converter(manager);
+        converter.Triangulate(attribute, /*pReplace*/ true, /*pLegacy*/ false);
+    }
+}
+
+} // namespace
+
+FbxSdk::FbxSdk() : mSamplesLeft(detail::kUnlimitedSamples) {}
+
+FbxSdk::~FbxSdk() {
+    mInitialized = false;
+    destroySdkObjects(&mManager);
+    mScene = nullptr;
+}
+
+// kept: nothing of the other context is copied
+FbxSdk& FbxSdk::operator=(const FbxSdk& other) {
+    if (this != &other) {
+        initFbxSdkManager();
+    }
+    return *this;
+}
+
+bool FbxSdk::initFbxSdkManager() {
+    if (!mInitialized) {
+        if (!initializeSdkObjects(&mManager, &mScene)) {
+            return false;
+        }
+        mInitialized = true;
+    }
+    return succeed();
+}
+
+bool FbxSdk::destroyFbxSdkManager() {
+    if (!mInitialized) {
+        return fail("there is no FBX manager to destroy");
+    }
+    destroySdkObjects(&mManager);
+    mScene = nullptr; // both died with the manager
+    mCurrentAnimStack = nullptr;
+    mInitialized = false;
+    return true; // the reason of a failure that led here stays
+}
+
+bool FbxSdk::initializeSdkObjects(fbxsdk::FbxManager** manager, fbxsdk::FbxScene** scene) {
+    if (manager == nullptr || scene == nullptr) {
+        return fail("no place for the FBX manager and its scene");
+    }
+    *manager = fbxsdk::FbxManager::Create();
+    if (*manager == nullptr) {
+        return fail("the FBX manager cannot be created");
+    }
+    *scene = fbxsdk::FbxScene::Create(*manager, "");
+    return succeed();
+}
+
+bool FbxSdk::destroySdkObjects(fbxsdk::FbxManager** manager) {
+    if (manager != nullptr && *manager != nullptr) {
+        (*manager)->Destroy();
+        *manager = nullptr;
+    }
+    return true;
+}
+
+fbxsdk::FbxScene* FbxSdk::getScene() const { return mScene; }
+
+bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, const std::string& fileName) {
+    if (manager == nullptr || scene == nullptr) {
+        return fail(fileName + ": no scene to load it into");
+    }
+    fbxsdk::FbxImporter* importer = fbxsdk::FbxImporter::Create(manager, "");
+    if (!importer->Initialize(fileName.c_str(), /*pFileFormat: detect*/ -1, /*pIOSettings*/ nullptr)) {
+        return fail(reasonFor(fileName, importer->GetStatus().GetErrorString())); // the manager releases the importer
+    }
+    if (importer->IsFBX()) {
+        const int takeCount = importer->GetAnimStackCount();
+        for (int i = 0; i < takeCount; ++i) {
+            static_cast<void>(importer->GetTakeInfo(i));
+        }
+        createImportSettings(manager);
+    }
+    const bool imported = importer->Import(scene, /*pNonBlocking*/ false);
+    const bool result =
+        imported ? succeed() : fail(reasonFor(fileName, importer->GetStatus().GetErrorString()));
+    importer->Destroy(/*pRecursive*/ false);
+    return result;
+}
+
+bool FbxSdk::loadScene(const std::string& fileName, bool convertGeometry) {
+    if (!mInitialized) {
+        return fail(fileName + ": the FBX manager is not initialised");
+    }
+    if (!loadScene(mManager, mScene, fileName)) {
+        return false;
+    }
+    convertToCentimetres(*mScene);
+    convertToYUp(*mScene);
+    if (convertGeometry) {
+        convertNurbsAndPatchRecursive(mManager, mScene->GetRootNode());
+    }
+    initCreateAnimationStack();
+    return succeed();
+}
+
+bool FbxSdk::convertNurbsAndPatch(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene) {
+    return convertNurbsAndPatchRecursive(manager, scene != nullptr ? scene->GetRootNode() : nullptr);
+}
+
+bool FbxSdk::convertNurbsAndPatchRecursive(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* node) {
+    return detail::walkNodes(node, [manager](fbxsdk::FbxNode& visited) {
+        triangulate(manager, visited);
+        return true;
+    });
+}
+
+// kept: the first stack is read, whatever the options' stack name
+void FbxSdk::initCreateAnimationStack() {
+    if (mScene == nullptr) {
+        return;
+    }
+    mCurrentAnimStack = mScene->GetSrcObjectCount(isStack()) > 0
+                            ? stackAt(*mScene, 0)
+                            : fbxsdk::FbxAnimStack::Create(mScene, kDefaultAnimationStackName.c_str());
+    const auto isLayer = fbxsdk::FbxCriteria::ObjectType(fbxsdk::FbxAnimLayer::ClassId);
+    if (mCurrentAnimStack != nullptr && mCurrentAnimStack->GetSrcObjectCount(isLayer) == 0) {
+        mCurrentAnimStack->AddMember(fbxsdk::FbxAnimLayer::Create(mScene, kDefaultLayerName));
+    }
+}
+
+bool FbxSdk::setCurrentAnimationStack(const std::string& name) {
+    const int count = mScene != nullptr ? mScene->GetSrcObjectCount(isStack()) : 0;
+    for (int i = 0; i < count; ++i) {
+        fbxsdk::FbxAnimStack* stack = stackAt(*mScene, i);
+        if (stack != nullptr && name == stack->GetName()) {
+            mCurrentAnimStack = stack;
+            return succeed();
+        }
+    }
+    return fail("the scene has no animation stack \"" + name + "\"");
+}
+
+bool FbxSdk::getAnimationStackNames(std::vector<std::string>& names) {
+    names.clear();
+    if (mScene == nullptr) {
+        return fail("no scene is loaded");
+    }
+    const int count = mScene->GetSrcObjectCount(isStack());
+    for (int i = 0; i < count; ++i) {
+        if (const fbxsdk::FbxAnimStack* stack = stackAt(*mScene, i)) {
+            names.emplace_back(stack->GetName());
+        }
+    }
+    return succeed();
+}
+
+bool FbxSdk::getGlobalAnimationStackTime(TnFbxTime& time, float frame, bool useSampleFPS, float sampleFPS) {
+    time.initTime();
+    if (!mInitialized || mScene == nullptr || mCurrentAnimStack == nullptr) {
+        return fail("no scene is loaded");
+    }
+    const fbxsdk::FbxTimeSpan span = mCurrentAnimStack->GetLocalTimeSpan();
+    const fbxsdk::FbxTime::EMode mode = mScene->GetGlobalSettings().GetTimeMode();
+    float rate = static_cast<float>(fbxsdk::FbxTime::GetFrameRate(mode));
+    int first = detail::narrowFrame(span.GetStart().GetFrameCount(mode));
+    int last = detail::narrowFrame(span.GetStop().GetFrameCount(mode));
+    if (sampleFPS > 0.0f && useSampleFPS) {
+        first = detail::convertFrame(first, rate, sampleFPS);
+        last = detail::convertFrame(last, rate, sampleFPS);
+        rate = sampleFPS;
+    }
+    time.setTime(frame, first, last, rate);
+    return succeed();
+}
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,150 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Reads every file of the corpus, compares it with its reference and prints a table. Fails when a row agrees less than
+// expected.json says, or when the files that differ are not those listed there.
+#include "Corpus.h"
+#include "Expectations.h"
+#include "Rows.h"
+
+#include <chrono>
+#include <cstdio>
+#include <cstring>
+#include <exception>
+
+namespace conformance {
+namespace {
+
+constexpr int kSkipped = 77; // ctest's SKIP_RETURN_CODE
+constexpr int kUsage = 2;
+constexpr std::size_t kDifferencesPerFile = 1;
+constexpr std::size_t kAllDifferences = 1000;
+
+constexpr const char* kUsageText = "usage: conformance [--file NAME] [--update] [--quiet]\n"
+                                   "  --file NAME  all differences of one file\n"
+                                   "  --update     write the numbers of this run to expected.json\n"
+                                   "  --quiet      the table and the violations only\n";
+
+struct Options {
+    std::string file;
+    bool update = false;
+    bool quiet = false;
+};
+
+bool parse(int argc, char** argv, Options& options) {
+    for (int i = 1; i < argc; ++i) {
+        if (std::strcmp(argv[i], "--update") == 0)
+            options.update = true;
+        else if (std::strcmp(argv[i], "--quiet") == 0)
+            options.quiet = true;
+        else if (std::strcmp(argv[i], "--file") == 0 && i + 1 < argc)
+            options.file = argv[++i];
+        else
+            return false;
+    }
+    return true;
+}
+
+void record(const Row& row, const CorpusFile& file, const Findings& findings, Results& results) {
+    RowResult& result = results[row.name];
+    result.compared += findings.compared();
+    result.agreeing += findings.agreeing();
+    if (findings.compared() > 0)
+        ++result.files;
+    if (findings.differs())
+        result.differingFiles.insert(file.name);
+}
+
+void printDifferences(const Row& row, const CorpusFile& file, const Findings& findings) {
+    for (const std::string& difference : findings.differences()) {
+        std::printf("%s: %s: %s\n", row.name, file.name.c_str(), difference.c_str());
+    }
+    const auto untold =
+        findings.compared() - findings.agreeing() - static_cast<std::int64_t>(findings.differences().size());
+    if (untold > 0)
+        std::printf("    and %lld more of %lld\n", static_cast<long long>(untold),
+                    static_cast<long long>(findings.compared()));
+}
+
+void checkFile(const CorpusFile& file, const Options& options, Results& results) {
+    const Reference reference = file.reference ? readReference(*file.reference) : Reference{};
+    LoadedFile loaded(file, reference);
+    if (!file.reference)
+        return; // nothing to compare with; it has been read
+    for (const Row& row : rows()) {
+        if (!reference.loads && row.check != checkLoads)
+            continue;
+        Findings findings(options.file.empty() ? kDifferencesPerFile : kAllDifferences);
+        row.check(loaded, findings);
+        record(row, file, findings, results);
+        if (!options.quiet)
+            printDifferences(row, file, findings);
+    }
+}
+
+void printTable(const Results& results) {
+    std::printf("\n%-20s %6s %9s %9s %9s %9s  %s\n", "row", "files", "differing", "compared", "agreeing", "percent",
+                "");
+    for (const Row& row : rows()) {
+        const auto found = results.find(row.name);
+        const RowResult result = found == results.end() ? RowResult{} : found->second;
+        const double percent =
+            result.compared == 0 ? 100.0
+                                 : 100.0 * static_cast<double>(result.agreeing) / static_cast<double>(result.compared);
+        std::printf("%-20s %6d %9zu %9lld %9lld %8.3f%%  %s\n", row.name, result.files, result.differingFiles.size(),
+                    static_cast<long long>(result.compared), static_cast<long long>(result.agreeing), percent,
+                    row.meaning);
+    }
+}
+
+int judge(const Options& options, const Results& results) {
+    Expectations expectations(TARNELL_CONFORMANCE_EXPECTED);
+    if (options.update) {
+        expectations.update(results);
+        expectations.write();
+    }
+    const std::vector<std::string> violations = expectations.violations(results);
+    for (const std::string& violation : violations)
+        std::printf("FAILED %s\n", violation.c_str());
+    return violations.empty() ? 0 : 1;
+}
+
+int run(const Options& options) {
+    const auto corpus = findCorpus();
+    if (!corpus) {
+        std::puts("corpus not found: conformance tests skipped");
+        return kSkipped;
+    }
+    const auto start = std::chrono::steady_clock::now();
+    Results results;
+    int files = 0;
+    for (const CorpusFile& file : listCorpus(*corpus)) {
+        if (!options.file.empty() && file.name != options.file)
+            continue;
+        checkFile(file, options, results);
+        ++files;
+    }
+    printTable(results);
+    const std::chrono::duration<double> seconds = std::chrono::steady_clock::now() - start;
+    std::printf("%d files in %.1f s\n", files, seconds.count());
+    if (files == 0)
+        return kUsage;
+    return options.file.empty() ? judge(options, results) : 0;
+}
+
+} // namespace
+} // namespace conformance
+
+int main(int argc, char** argv) {
+    conformance::Options options;
+    if (!conformance::parse(argc, argv, options)) {
+        std::fputs(conformance::kUsageText, stderr);
+        return conformance::kUsage;
+    }
+    try {
+        return conformance::run(options);
+    } catch (const std::exception& error) {
+        std::fprintf(stderr, "conformance: %s\n", error.what());
+        return 1;
+    }
+}

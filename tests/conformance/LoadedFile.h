@@ -1,0 +1,78 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A file as the platform reads it: its nodes beside those of the reference, values as stored, then the scene in the
+// library's normal form (centimetres, Y up, right-handed).
+#pragma once
+
+#include "Corpus.h"
+#include "Reference.h"
+
+#include <FbxSdk.h>
+
+#include <string>
+#include <vector>
+
+namespace conformance {
+
+/// A node of the scene, with what has to be read before the conversion changes it.
+struct SceneNode {
+    fbxsdk::FbxNode* node = nullptr;
+    int parent = -1;              ///< index in the same list
+    NamedNumbers curves;          ///< as stored: the sums over the layers, per frame of the reference
+    NamedNumbers camera, light;   ///< as stored
+    bool conversionMoves = false; ///< the conversion changes the node's own local values
+};
+
+class LoadedFile {
+public:
+    LoadedFile(const CorpusFile& file, const Reference& reference);
+    ~LoadedFile();
+    LoadedFile(const LoadedFile&) = delete;
+    LoadedFile& operator=(const LoadedFile&) = delete;
+
+    [[nodiscard]] const CorpusFile& file() const { return mFile; }
+    [[nodiscard]] const Reference& reference() const { return mReference; }
+    [[nodiscard]] bool loaded() const { return mLoaded; }
+
+    /// The scene, null when the file did not load.
+    [[nodiscard]] fbxsdk::FbxScene* scene() const { return mScene; }
+    [[nodiscard]] fbxsdk::FbxAnimStack* firstStack() const;
+    /// The nodes below the root, parents before their children.
+    [[nodiscard]] const std::vector<SceneNode>& nodes() const { return mNodes; }
+    /// The node that the reference has at `index`; null when this scene has none like it.
+    [[nodiscard]] const SceneNode* nodeOf(std::size_t index) const { return mNodeOfReference[index]; }
+    /// Whether the reference's node is one of the producer cameras, which this scene keeps beside the tree.
+    [[nodiscard]] bool besideTree(std::size_t index) const;
+
+    /// What deforms meshes; its own scene stays empty.
+    [[nodiscard]] Tarnell::Fbx::FbxSdk& sdk() { return mSdk; }
+
+private:
+    void collectNodes(fbxsdk::FbxNode& parent, int parentIndex);
+    void collectProducerCameras();
+    void readStoredValues(SceneNode& node) const;
+    void markMovedNodes();
+    void normalise();
+    void matchReference();
+
+    const CorpusFile& mFile;
+    const Reference& mReference;
+    Tarnell::Fbx::FbxSdk mSdk;
+    fbxsdk::FbxManager* mManager = nullptr;
+    fbxsdk::FbxScene* mScene = nullptr;
+    bool mLoaded = false;
+    std::vector<SceneNode> mNodes;
+    std::vector<SceneNode> mProducers;
+    std::vector<const SceneNode*> mNodeOfReference;
+};
+
+/// The frame's time in the file.
+fbxsdk::FbxTime timeOfSeconds(double seconds);
+/// The node's place in the world at a time.
+fbxsdk::FbxAMatrix worldMatrix(fbxsdk::FbxNode& node, const fbxsdk::FbxTime& time);
+/// The node's geometric transform.
+fbxsdk::FbxAMatrix geometricMatrix(const fbxsdk::FbxNode& node);
+Matrix12 asMatrix12(const fbxsdk::FbxAMatrix& matrix);
+
+} // namespace conformance

@@ -1,0 +1,34 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The table itself.
+#include "Rows.h"
+
+namespace conformance {
+namespace {
+
+constexpr Row kRows[] = {
+    {"loads", "the file loads, or is refused", checkLoads},
+    {"nodes", "names, parents and kinds of all nodes, in order", checkNodes},
+    {"nodeSettings", "inherit types and rotation orders", checkNodeSettings},
+    {"stacks", "animation stacks: names, times, layers", checkStacks},
+    {"geometricTransforms", "geometric transforms of the nodes", checkGeometricTransforms},
+    {"worldMatrices", "world matrices of all nodes at all frames", checkWorldMatrices},
+    {"curves", "sums of the transform curves at all frames", checkCurves},
+    {"cameras", "camera values as stored", checkCameras},
+    {"lights", "light values as stored", checkLights},
+    {"meshTopology", "counts, polygons, layers and deformers of meshes", checkMeshTopology},
+    {"worldPoints", "points of undeformed meshes in the world", checkWorldPoints},
+    {"deformedPoints", "points of skinned and cached meshes in the world", checkDeformedPoints},
+    {"wavefront", "undeformed meshes against Wavefront files", checkWavefrontPoints},
+    {"deformedWavefront", "skinned and cached meshes against Wavefront files", checkDeformedWavefrontPoints},
+    {"libraryMeshes", "meshes as the library hands them out", checkLibraryMeshes},
+    {"libraryLocalSamples", "local transform samples of the library", checkLibraryLocalSamples},
+    {"libraryPositions", "positions in the world of the library", checkLibraryPositions},
+};
+
+} // namespace
+
+std::span<const Row> rows() { return kRows; }
+
+} // namespace conformance

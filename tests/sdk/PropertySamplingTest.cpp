@@ -1,0 +1,280 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Sampling: which frames an animated property is sampled over, and what the samples are.
+#include "sdk/SampleRange.h"
+
+#include "support/SceneBuilders.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdint>
+#include <limits>
+
+namespace Tarnell::Fbx {
+namespace {
+
+using test::TestScene;
+using test::timeOfFrame;
+using Transform = TnFbxTransform;
+using Samples = std::vector<float>;
+
+constexpr int kHighest = std::numeric_limits<int>::max();
+constexpr int kLowest = std::numeric_limits<int>::min();
+
+TnFbxTime timeRecord(int startFrame, int endFrame) {
+    TnFbxTime time;
+    time.setTime(0.0f, startFrame, endFrame, 24.0f);
+    return time;
+}
+
+/// The local transform of a node, sampled over the stack's range or the one given.
+Transform localTransform(TestScene& scene, fbxsdk::FbxNode* node, TnFbxTime time, bool useSampleRate = false,
+                         float sampleRate = 0.0f) {
+    Transform transform;
+    EXPECT_TRUE(scene.sdk.setTransformValues(node, time, useSampleRate, sampleRate, &transform));
+    return transform;
+}
+
+TEST(SampleRange, SubtractsWithWrapAround) {
+    EXPECT_EQ(detail::wrappingSubtract(10, 3), 7);
+    EXPECT_EQ(detail::wrappingSubtract(kLowest, kHighest), 1);
+    EXPECT_EQ(detail::wrappingSubtract(kHighest, kLowest), -1);
+    EXPECT_EQ(detail::wrappingSubtract(0, kLowest), kLowest);
+}
+
+TEST(SampleRange, NarrowsFramesToTheirLow32Bits) {
+    EXPECT_EQ(detail::narrowFrame(-5), -5);
+    EXPECT_EQ(detail::narrowFrame(std::int64_t{1} << 32), 0);
+    EXPECT_EQ(detail::narrowFrame(std::int64_t{1} << 31), kLowest);
+}
+
+TEST(SampleRange, ConvertsFramesByDividingFirstAndTruncatesTowardZero) {
+    EXPECT_EQ(detail::convertFrame(10, 24.0f, 48.0f), 20);
+    EXPECT_EQ(detail::convertFrame(1, 24.0f, 25.0f), 1);
+    EXPECT_EQ(detail::convertFrame(7, 24.0f, 25.0f), 7);
+    EXPECT_EQ(detail::convertFrame(-7, 24.0f, 25.0f), -7);
+    EXPECT_EQ(detail::convertFrame(kHighest, 24.0f, 48.0f), kHighest);
+    EXPECT_EQ(detail::convertFrame(1, 24.0f, std::numeric_limits<float>::infinity()), kHighest);
+    EXPECT_EQ(detail::convertFrame(0, 24.0f, std::numeric_limits<float>::infinity()), kLowest);
+}
+
+TEST(SampleRange, UntouchedCountsAsAnAnimationWithoutFrames) {
+    const detail::SampleRange range;
+
+    EXPECT_TRUE(range.isAnimation());
+    EXPECT_LT(range.last, range.first);
+}
+
+TEST(SampleRange, OfOneFrameIsNoAnimation) {
+    detail::SampleRange range;
+    range.include(5, 5);
+    EXPECT_FALSE(range.isAnimation());
+    range.include(4, 4);
+    EXPECT_TRUE(range.isAnimation());
+    EXPECT_EQ(range.first, 4);
+    EXPECT_EQ(range.last, 5);
+}
+
+TEST(SampleRange, OfHalfTheIntegersIsNoAnimation) {
+    detail::SampleRange range;
+    range.include(kLowest, 0);
+    EXPECT_FALSE(range.isAnimation());
+}
+
+TEST(SampleLimits, HoldForOneChannelAndForTheWhole) {
+    std::int64_t left = 100;
+    EXPECT_TRUE(detail::takeSamples(left, 10, 9));
+    EXPECT_EQ(left, 10);
+    EXPECT_FALSE(detail::takeSamples(left, 11, 1));
+    EXPECT_EQ(left, 10);
+
+    std::int64_t unlimited = detail::kUnlimitedSamples;
+    EXPECT_TRUE(detail::takeSamples(unlimited, FbxSdk::kMaxSamplesPerChannel, 9));
+    EXPECT_EQ(unlimited, detail::kUnlimitedSamples);
+    EXPECT_FALSE(detail::takeSamples(unlimited, FbxSdk::kMaxSamplesPerChannel + 1, 1));
+}
+
+TEST(PropertySampling, KeepsTheStaticValueOfAPropertyWithoutCurves) {
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("still");
+    node->LclTranslation.Set({1.5, -2.0, 3.25});
+
+    const Transform transform = localTransform(scene, node, scene.time());
+
+    EXPECT_FALSE(transform.getTransformAnimated(Transform::kFbxTransformPositionX));
+    EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformPositionX), 1.5f);
+    EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformPositionY), -2.0f);
+    EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformPositionZ), 3.25f);
+    EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformScaleX), 1.0f);
+}
+
+TEST(PropertySampling, LeavesTheSamplesOfAnObjectAloneWhenThePropertyHasNone) {
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("still");
+    Transform transform;
+    transform.setTransformValueAt(Transform::kFbxTransformPositionX, timeRecord(3, 4), {7.0f, 8.0f});
+    TnFbxTime time = scene.time();
+
+    scene.sdk.setTransformValues(node, time, false, 0.0f, &transform);
+
+    EXPECT_EQ(test::samplesOf(transform, Transform::kFbxTransformPositionX), Samples({7.0f, 8.0f}));
+}
+
+TEST(PropertySampling, SamplesEveryFrameOfTheRequestedRangeWhenTheKeysLieInside) {
+    TestScene scene(0, 6);
+    fbxsdk::FbxNode* node = scene.addNode("moving");
+    scene.key(node->LclTranslation, "X", {{2, 10.0f}, {4, 20.0f}});
+
+    const Transform transform = localTransform(scene, node, scene.time());
+
+    test::expectRange(transform.getTransformTime(Transform::kFbxTransformPositionX), 0, 6, 24.0f);
+    EXPECT_EQ(test::samplesOf(transform, Transform::kFbxTransformPositionX),
+              Samples({10.0f, 10.0f, 10.0f, 15.0f, 20.0f, 20.0f, 20.0f}));
+    EXPECT_FALSE(transform.getTransformAnimated(Transform::kFbxTransformPositionY));
+}
+
+TEST(PropertySampling, ReachesToTheKeysBeyondTheRequestedRange) {
+    TestScene scene(2, 3);
+    fbxsdk::FbxNode* node = scene.addNode("moving");
+    scene.key(node->LclTranslation, "Y", {{-1, -1.0f}, {4, 4.0f}});
+
+    const Transform transform = localTransform(scene, node, scene.time());
+
+    test::expectRange(transform.getTransformTime(Transform::kFbxTransformPositionY), -1, 4, 24.0f);
+    EXPECT_EQ(test::samplesOf(transform, Transform::kFbxTransformPositionY),
+              Samples({-1.0f, 0.0f, 1.0f, 2.0f, 3.0f, 4.0f}));
+}
+
+TEST(PropertySampling, TakesASingleFrameForNoAnimation) {
+    TestScene scene(5, 5);
+    fbxsdk::FbxNode* node = scene.addNode("posed");
+    scene.key(node->LclTranslation, "X", {{5, 10.0f}});
+
+    const Transform transform = localTransform(scene, node, scene.time());
+
+    EXPECT_FALSE(transform.getTransformAnimated(Transform::kFbxTransformPositionX));
+    EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformPositionX), 0.0f);
+}
+
+TEST(PropertySampling, TakesOneKeyInALongerRangeForAnAnimation) {
+    TestScene scene(5, 7);
+    fbxsdk::FbxNode* node = scene.addNode("posed");
+    scene.key(node->LclTranslation, "X", {{5, 10.0f}});
+
+    const Transform transform = localTransform(scene, node, scene.time());
+
+    EXPECT_EQ(test::samplesOf(transform, Transform::kFbxTransformPositionX), Samples({10.0f, 10.0f, 10.0f}));
+}
+
+TEST(PropertySampling, AddsTheCurvesOfAllLayers) {
+    TestScene scene(0, 2);
+    fbxsdk::FbxNode* node = scene.addNode("layered");
+    scene.key(node->LclTranslation, "X", {{0, 1.0f}, {2, 3.0f}});
+    scene.key(node->LclTranslation, "X", {{0, 10.0f}, {4, 50.0f}}, scene.addLayer());
+
+    const Transform transform = localTransform(scene, node, scene.time());
+
+    test::expectRange(transform.getTransformTime(Transform::kFbxTransformPositionX), 0, 4, 24.0f);
+    EXPECT_EQ(test::samplesOf(transform, Transform::kFbxTransformPositionX),
+              Samples({11.0f, 22.0f, 33.0f, 43.0f, 53.0f}));
+}
+
+TEST(PropertySampling, AddsNothingForALayerWithoutACurve) {
+    TestScene scene(0, 2);
+    fbxsdk::FbxNode* node = scene.addNode("layered");
+    node->LclTranslation.Set({100.0, 0.0, 0.0});
+    scene.key(node->LclTranslation, "X", {{0, 10.0f}, {2, 50.0f}}, scene.addLayer());
+
+    const Transform transform = localTransform(scene, node, scene.time());
+
+    EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformPositionX), 100.0f);
+    EXPECT_EQ(test::samplesOf(transform, Transform::kFbxTransformPositionX), Samples({10.0f, 30.0f, 50.0f}));
+}
+
+TEST(PropertySampling, SamplesAConvertedRangeAtTheRateOfTheScene) {
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("moving");
+    scene.key(node->LclTranslation, "X", {{0, 0.0f}, {10, 10.0f}});
+
+    const Transform transform = localTransform(scene, node, timeRecord(0, 0), true, 48.0f);
+
+    test::expectRange(transform.getTransformTime(Transform::kFbxTransformPositionX), 0, 20, 24.0f);
+    const Samples samples = test::samplesOf(transform, Transform::kFbxTransformPositionX);
+    ASSERT_EQ(samples.size(), 21u);
+    EXPECT_EQ(samples[5], 5.0f);
+    EXPECT_EQ(samples[10], 10.0f);
+    EXPECT_EQ(samples[20], 10.0f);
+}
+
+TEST(PropertySampling, ConvertsOnlyToARateAboveZero) {
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("moving");
+    scene.key(node->LclTranslation, "X", {{0, 0.0f}, {10, 10.0f}});
+
+    for (const float rate : {0.0f, -48.0f, std::numeric_limits<float>::quiet_NaN()}) {
+        const Transform transform = localTransform(scene, node, timeRecord(0, 0), true, rate);
+        test::expectRange(transform.getTransformTime(Transform::kFbxTransformPositionX), 0, 10, 24.0f);
+    }
+}
+
+TEST(PropertySampling, NeverMakesACurve) {
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("still");
+
+    localTransform(scene, node, scene.time());
+
+    EXPECT_EQ(scene.scene->GetSrcObjectCount<fbxsdk::FbxAnimCurve>(), 0);
+    EXPECT_EQ(scene.scene->GetSrcObjectCount<fbxsdk::FbxAnimCurveNode>(), 0);
+}
+
+TEST(PropertySampling, KeepsTheStaticValueWhenTheStackSpansMoreFramesThanAChannelHolds) {
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("moving");
+    node->LclTranslation.Set({3.0, 0.0, 0.0});
+    scene.key(node->LclTranslation, "X", {{0, 0.0f}, {10, 10.0f}});
+
+    for (const int last : {static_cast<int>(FbxSdk::kMaxSamplesPerChannel), 2000000000, kHighest}) {
+        const Transform transform = localTransform(scene, node, timeRecord(0, last));
+        EXPECT_FALSE(transform.getTransformAnimated(Transform::kFbxTransformPositionX));
+        EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformPositionX), 3.0f);
+    }
+}
+
+TEST(PropertySampling, SurvivesKeysAtTheEndsOfTime) {
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("moving");
+    node->LclTranslation.Set({3.0, 0.0, 0.0});
+    fbxsdk::FbxAnimCurve* curve = scene.key(node->LclTranslation, "X", {{0, 1.0f}});
+    for (const fbxsdk::FbxTime time : {fbxsdk::FBXSDK_TIME_MINUS_INFINITE, fbxsdk::FBXSDK_TIME_INFINITE}) {
+        curve->KeySet(curve->KeyAdd(time), time, 1.0f);
+    }
+
+    const Transform transform = localTransform(scene, node, scene.time());
+
+    EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformPositionX), 3.0f);
+}
+
+TEST(PropertySampling, SamplesNothingWithoutAStack) {
+    FbxSdk sdk;
+    ASSERT_TRUE(sdk.initFbxSdkManager());
+    fbxsdk::FbxNode* node = fbxsdk::FbxNode::Create(sdk.getScene(), "node");
+    Transform transform;
+    TnFbxTime time = timeRecord(0, 10);
+
+    EXPECT_TRUE(sdk.setTransformValues(node, time, false, 0.0f, &transform));
+
+    EXPECT_FALSE(transform.getTransformAnimated(Transform::kFbxTransformPositionX));
+}
+
+TEST(PropertySampling, IgnoresANullNodeAndANullTransform) {
+    TestScene scene(0, 10);
+    TnFbxTime time = scene.time();
+    Transform transform;
+
+    EXPECT_TRUE(scene.sdk.setTransformValues(nullptr, time, false, 0.0f, &transform));
+    EXPECT_TRUE(scene.sdk.setTransformValues(scene.addNode("node"), time, false, 0.0f, nullptr));
+}
+
+} // namespace
+} // namespace Tarnell::Fbx

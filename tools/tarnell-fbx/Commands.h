@@ -1,0 +1,39 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The commands of the tool. Each returns the process's exit status.
+#pragma once
+
+#include <optional>
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace tool {
+
+enum ExitStatus { kSuccess = 0, kUnreadable = 1, kWrongUsage = 2 };
+
+struct DumpOptions {
+    std::string file;
+    std::vector<std::string> kinds; ///< empty: all
+    bool local = false;
+    float frame = 0.0F;
+    std::optional<std::pair<int, int>> frames; ///< meshes at every whole frame of the range
+    std::optional<float> sampleFps;
+    bool transformPoints = true;
+    bool computeCameraRotation = false;
+    std::optional<std::string> name;
+    bool samples = true;
+    bool pretty = false;
+};
+
+/// The names of the kinds that dump knows, in the order in which it prints them.
+const std::vector<std::string>& dumpKinds();
+
+int dump(const DumpOptions& options);
+int info(const std::vector<std::string>& files);
+
+/// One line on standard error, as every failure of the tool prints it.
+void printError(const std::string& file, const std::string& reason);
+
+} // namespace tool

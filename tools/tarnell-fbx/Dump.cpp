@@ -1,0 +1,359 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// tarnell-fbx dump: the library's value objects as JSON.
+#include <algorithm>
+#include <functional>
+#include <iostream>
+#include <memory>
+
+#include "Commands.h"
+#include "JsonWriter.h"
+
+#include "Fbx.h"
+#include "FbxSdk.h"
+#include "TnFbxCamera.h"
+#include "TnFbxError.h"
+#include "TnFbxLight.h"
+#include "TnFbxMarker.h"
+#include "TnFbxMesh.h"
+#include "TnFbxNull.h"
+#include "TnFbxReadInfo.h"
+
+namespace tool {
+namespace {
+
+using namespace Tarnell::Fbx;
+
+/// Prints the parts that objects are made of.
+class ObjectPrinter {
+public:
+    ObjectPrinter(JsonWriter& json, bool samples) : mJson(json), mSamples(samples) {}
+
+    void enumerator(const char* key, std::initializer_list<const char*> names, int value) {
+        mJson.key(key);
+        const auto index = static_cast<std::size_t>(value);
+        mJson.text(index < names.size() ? names.begin()[index] : "");
+    }
+
+    void number(const char* key, float value) {
+        mJson.key(key);
+        mJson.real(value);
+    }
+
+    void transform(TnFbxTransform& object) {
+        mJson.key("name");
+        mJson.text(object.getName());
+        enumerator("rotationOrder", {"XYZ", "XZY", "YXZ", "YZX", "ZXY", "ZYX"}, object.getTransformRotationOrder());
+        mJson.key("transform");
+        mJson.beginObject();
+        for (int i = 0;; ++i) {
+            const auto channel = static_cast<TnFbxTransform::EFbxTransformChannelType>(i);
+            const char* name = TnFbxTransform::getTransformChannelName(channel);
+            if (!name)
+                break;
+            mJson.key(name);
+            print(object.getTransformValue(channel), object.getTransformAnimated(channel),
+                  object.getTransformTime(channel),
+                  [&](float frame) { return object.getTransformValueAt(channel, frame); });
+        }
+        mJson.endObject();
+    }
+
+    /// All channels of a class with named channels of its own.
+    template <class Object, class Channel>
+    void channels(Object& object) {
+        mJson.key("channels");
+        mJson.beginObject();
+        for (int i = 0;; ++i) {
+            const auto channel = static_cast<Channel>(i);
+            const char* name = Object::getChannelName(channel);
+            if (!name)
+                break;
+            mJson.key(name);
+            print(object.getValue(channel), object.getAnimated(channel), object.getTime(channel),
+                  [&](float frame) { return object.getValueAt(channel, frame); });
+        }
+        mJson.endObject();
+    }
+
+    void details(TnFbxCamera& camera) {
+        enumerator("projection", {"perspective", "orthographic"}, camera.getProjectionType());
+        enumerator("apertureMode", {"horizontalAndVertical", "horizontal", "vertical", "focalLength"},
+                   camera.getApertureMode());
+        channels<TnFbxCamera, TnFbxCamera::EFbxCameraChannelType>(camera);
+    }
+    void details(TnFbxLight& light) {
+        enumerator("type", {"point", "directional", "spot"}, light.getLightType());
+        enumerator("decay", {"none", "linear", "quadratic", "cubic"}, light.getDecayType());
+        channels<TnFbxLight, TnFbxLight::EFbxLightChannelType>(light);
+    }
+    void details(TnFbxMarker& marker) {
+        number("size", marker.getMarkerSize());
+        enumerator("look", {"cube", "hardCross", "lightCross", "sphere"}, marker.getMarkerLookType());
+        channels<TnFbxMarker, TnFbxMarker::EFbxMarkerChannelType>(marker);
+    }
+    void details(TnFbxNull& null) {
+        number("size", null.getNullSize());
+        enumerator("look", {"none", "cross"}, null.getNullLookType());
+    }
+    void details(TnFbxTransform&) {}
+    void details(TnFbxMesh& mesh) {
+        const int corners = mesh.getNumberOfPolygonVertices();
+        integers("polygonVertexSizes", mesh.getNumberOfPolygons(), [&](int i) { return mesh.getPolygonVertexSize(i); });
+        integers("pointIndices", corners, [&](int i) { return mesh.getPointIndex(i); });
+        reals("controlPoints", true, mesh.getNumberOfControlPoints(), 3,
+              [&](int i, float* v) { mesh.getControlPoint(i, v[0], v[1], v[2]); });
+        reals("normals", mesh.getValidNormals(), corners, 3,
+              [&](int i, float* v) { mesh.getNormal(i, v[0], v[1], v[2]); });
+        reals("uvs", mesh.getValidUVs(), corners, 2, [&](int i, float* v) { mesh.getUV(i, v[0], v[1]); });
+        reals("colours", mesh.getValidColours(), corners, 4,
+              [&](int i, float* v) { mesh.getColour(i, v[0], v[1], v[2], v[3]); });
+    }
+
+private:
+    template <class ValueAt>
+    void print(float value, bool animated, const TnFbxTime& time, const ValueAt& valueAt) {
+        if (!animated) {
+            mJson.real(value);
+            return;
+        }
+        mJson.beginObject();
+        number("value", value);
+        mJson.key("start");
+        mJson.integer(time.getStartFrame());
+        mJson.key("end");
+        mJson.integer(time.getEndFrame());
+        number("rate", time.getFrameRate());
+        if (mSamples) {
+            mJson.key("samples");
+            mJson.beginArray();
+            for (long long frame = time.getStartFrame(); frame <= time.getEndFrame(); ++frame) {
+                mJson.real(valueAt(static_cast<float>(frame)));
+            }
+            mJson.endArray();
+        }
+        mJson.endObject();
+    }
+
+    template <class At>
+    void integers(const char* key, int count, const At& at) {
+        mJson.key(key);
+        mJson.beginArray();
+        for (int i = 0; i < count; ++i)
+            mJson.integer(at(i));
+        mJson.endArray();
+    }
+
+    template <class Fill>
+    void reals(const char* key, bool valid, int count, int components, const Fill& fill) {
+        mJson.key(key);
+        if (!valid) {
+            mJson.null();
+            return;
+        }
+        mJson.beginArray();
+        for (int i = 0; i < count; ++i) {
+            float values[4] = {};
+            fill(i, values);
+            for (int c = 0; c < components; ++c)
+                mJson.real(values[c]);
+        }
+        mJson.endArray();
+    }
+
+    JsonWriter& mJson;
+    bool mSamples;
+};
+
+/// One file, loaded once, and everything that is asked of it.
+class Dump {
+public:
+    Dump(const DumpOptions& options, std::ostream& out)
+        : mOptions(options), mJson(out, options.pretty), mPrinter(mJson, options.samples) {
+        mInfo.setFileName(options.file);
+        mInfo.setAnimationStackName("*"); // any name will do: the first stack is read
+        mInfo.setGlobalTransform(!options.local);
+        mInfo.setTransformPoints(options.transformPoints);
+        mInfo.setFrame(options.frame);
+        mInfo.setComputeCameraRotation(options.computeCameraRotation);
+        mInfo.setUseSampleFPS(options.sampleFps.has_value());
+        if (options.sampleFps)
+            mInfo.setSampleFPS(*options.sampleFps);
+        mInfo.setAllObjects(!options.name.has_value());
+        if (options.name)
+            mInfo.setObjectName(*options.name);
+    }
+
+    bool load() { return mFbx.loadScene(mOptions.file, mSdk); }
+
+    bool print() {
+        mJson.beginObject();
+        mJson.key("file");
+        mJson.text(mOptions.file.substr(mOptions.file.find_last_of('/') + 1));
+        printStacks();
+        printRange();
+        bool complete = true;
+        for (const Kind& kind : kinds()) {
+            if (wanted(kind.name))
+                complete = kind.print(*this) && complete;
+        }
+        mJson.endObject();
+        return complete;
+    }
+
+    struct Kind {
+        const char* name;
+        std::function<bool(Dump&)> print;
+    };
+    static const std::vector<Kind>& kinds();
+
+private:
+    [[nodiscard]] bool wanted(const std::string& kind) const {
+        const auto& asked = mOptions.kinds;
+        return asked.empty() || std::find(asked.begin(), asked.end(), kind) != asked.end();
+    }
+
+    void printStacks() {
+        std::vector<std::string> names;
+        mSdk.getAnimationStackNames(names);
+        mJson.key("stacks");
+        mJson.beginArray();
+        for (const std::string& name : names)
+            mJson.text(name);
+        mJson.endArray();
+    }
+
+    void printRange() {
+        float start = 0.0F, end = 0.0F;
+        const bool animated = mSdk.getAnimationFrameRange(start, end);
+        mJson.key("range");
+        if (!animated) {
+            mJson.null();
+            return;
+        }
+        mJson.beginObject();
+        mPrinter.number("start", start);
+        mPrinter.number("end", end);
+        mJson.endObject();
+    }
+
+    /// Reads all objects of one kind, or the named one, and hands each to `each`.
+    template <class Object, class Each>
+    bool read(int (FbxSdk::*count)() const, int mask, bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int),
+              const Each& each) {
+        const int number =
+            mFbx.getNumberOfObjects((mSdk.*count)(), mInfo.getAllObjects(), mask, mInfo.getObjectName(), mSdk);
+        if (number < 1)
+            return true;
+        const std::unique_ptr<Object[]> objects(new Object[static_cast<std::size_t>(number)]);
+        const bool complete = (mSdk.*fill)(mInfo, objects.get(), number);
+        for (int i = 0; i < number; ++i)
+            each(objects[static_cast<std::size_t>(i)]);
+        return complete;
+    }
+
+    template <class Object>
+    bool printKind(const char* name, int (FbxSdk::*count)() const, int mask,
+                   bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int)) {
+        mJson.key(name);
+        mJson.beginArray();
+        const bool complete = read<Object>(count, mask, fill, [&](Object& object) {
+            mJson.beginObject();
+            mPrinter.transform(object);
+            mPrinter.details(object);
+            mJson.endObject();
+        });
+        mJson.endArray();
+        return complete;
+    }
+
+    bool printMeshes() {
+        mJson.key("meshes");
+        mJson.beginArray();
+        bool complete = true;
+        const bool ranged = mOptions.frames.has_value();
+        const int first = ranged ? mOptions.frames->first : 0;
+        const int last = ranged ? mOptions.frames->second : 0;
+        for (long long frame = first; frame <= last; ++frame) {
+            const float at = ranged ? static_cast<float>(frame) : mOptions.frame;
+            mInfo.setFrame(at);
+            complete = read<TnFbxMesh>(&FbxSdk::getNumberOfMeshes, 4, &FbxSdk::getMeshes,
+                                       [&](TnFbxMesh& mesh) {
+                                           mJson.beginObject();
+                                           mPrinter.transform(mesh);
+                                           mPrinter.number("frame", at);
+                                           mPrinter.details(mesh);
+                                           mJson.endObject();
+                                       }) &&
+                       complete;
+        }
+        mInfo.setFrame(mOptions.frame);
+        mJson.endArray();
+        return complete;
+    }
+
+    const DumpOptions& mOptions;
+    JsonWriter mJson;
+    ObjectPrinter mPrinter;
+    TnFbxReadInfo mInfo;
+    Tarnell::Fbx::Fbx mFbx;
+    FbxSdk mSdk;
+};
+
+const std::vector<Dump::Kind>& Dump::kinds() {
+    static const std::vector<Kind> kKinds = {
+        {"cameras",
+         [](Dump& d) {
+             return d.printKind<TnFbxCamera>("cameras", &FbxSdk::getNumberOfCameras, 32, &FbxSdk::getCameras);
+         }},
+        {"lights",
+         [](Dump& d) { return d.printKind<TnFbxLight>("lights", &FbxSdk::getNumberOfLights, 64, &FbxSdk::getLights); }},
+        {"markers",
+         [](Dump& d) {
+             return d.printKind<TnFbxMarker>("markers", &FbxSdk::getNumberOfMarkers, 1, &FbxSdk::getMarkers);
+         }},
+        {"nulls",
+         [](Dump& d) { return d.printKind<TnFbxNull>("nulls", &FbxSdk::getNumberOfNulls, 0x4000, &FbxSdk::getNulls); }},
+        {"transforms",
+         [](Dump& d) {
+             return d.printKind<TnFbxTransform>("transforms", &FbxSdk::getNumberOfTransforms, 0x4005,
+                                                &FbxSdk::getTransforms);
+         }},
+        {"meshes", [](Dump& d) { return d.printMeshes(); }},
+    };
+    return kKinds;
+}
+
+} // namespace
+
+const std::vector<std::string>& dumpKinds() {
+    static const std::vector<std::string> kNames = [] {
+        std::vector<std::string> names;
+        for (const Dump::Kind& kind : Dump::kinds())
+            names.emplace_back(kind.name);
+        return names;
+    }();
+    return kNames;
+}
+
+void printError(const std::string& file, const std::string& reason) {
+    std::cerr << "tarnell-fbx: " << file << ": " << reason << '\n';
+}
+
+int dump(const DumpOptions& options) {
+    Dump dump(options, std::cout);
+    if (!dump.load()) {
+        printError(options.file, lastError());
+        return kUnreadable;
+    }
+    const bool complete = dump.print();
+    std::cout << '\n' << std::flush;
+    if (!complete || !std::cout) {
+        printError(options.file, complete ? "the output could not be written" : lastError());
+        return kUnreadable;
+    }
+    return kSuccess;
+}
+
+} // namespace tool

@@ -1,0 +1,77 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// tarnell-fbx: options and commands.
+#include <cstdio>
+#include <iostream>
+
+#include <CLI/CLI.hpp>
+
+#include "Commands.h"
+
+namespace {
+
+/// "A:B", or a single frame.
+std::string parseFrames(const std::string& text, std::optional<std::pair<int, int>>& frames) {
+    int first = 0, last = 0;
+    int used = 0;
+    const char* const end = text.c_str() + text.size();
+    if (std::sscanf(text.c_str(), "%d:%d%n", &first, &last, &used) == 2 && text.c_str() + used == end) {
+        if (first > last)
+            return "the range " + text + " ends before it starts";
+    } else if (std::sscanf(text.c_str(), "%d%n", &first, &used) == 1 && text.c_str() + used == end) {
+        last = first;
+    } else {
+        return "not a range of frames: " + text;
+    }
+    frames = {first, last};
+    return {};
+}
+
+void addDump(CLI::App& app, tool::DumpOptions& options) {
+    CLI::App* dump = app.add_subcommand("dump", "Print what the library reads as one JSON document");
+    dump->add_option("FILE", options.file, "The FBX file")->required();
+    dump->add_option("--kind", options.kinds, "Comma list of kinds (default: all six)")
+        ->delimiter(',')
+        ->check(CLI::IsMember(tool::dumpKinds()));
+    dump->add_flag("--local", options.local, "Local transforms instead of global ones");
+    dump->add_option("--frame", options.frame, "Frame at which static values and meshes are read");
+    dump->add_option_function<std::string>(
+            "--frames",
+            [&options](const std::string& text) {
+                const std::string complaint = parseFrames(text, options.frames);
+                if (!complaint.empty())
+                    throw CLI::ValidationError("--frames", complaint);
+            },
+            "A:B, meshes are read at every whole frame of the range")
+        ->type_name("A:B");
+    dump->add_option("--sample-fps", options.sampleFps, "Sample at this many frames per second");
+    dump->add_flag("!--no-transform-points", options.transformPoints, "Leave mesh points in the node's space");
+    dump->add_flag("--compute-camera-rotation", options.computeCameraRotation,
+                   "Compute the rotation of cameras without target from their interest");
+    dump->add_option("--name", options.name, "Only the object of that name");
+    dump->add_flag("!--no-samples", options.samples, "Leave the sample arrays out");
+    dump->add_flag("--pretty", options.pretty, "Indented");
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    std::ios::sync_with_stdio(false);
+    CLI::App app("Looks into FBX files", "tarnell-fbx");
+    app.require_subcommand(1);
+    tool::DumpOptions dumpOptions;
+    addDump(app, dumpOptions);
+    std::vector<std::string> infoFiles;
+    CLI::App* info = app.add_subcommand("info", "Show on one screen what a file holds");
+    info->add_option("FILE", infoFiles, "FBX files")->required();
+
+    try {
+        app.parse(argc, argv);
+    } catch (const CLI::ParseError& error) {
+        const bool asked = error.get_exit_code() == 0; // --help
+        app.exit(error, std::cout, std::cerr);
+        return asked ? tool::kSuccess : tool::kWrongUsage;
+    }
+    return *info ? tool::info(infoFiles) : tool::dump(dumpOptions);
+}
