@@ -29,8 +29,8 @@ class PropertySampler;
 
 /// One scene and what can be read from it.
 ///
-/// The order of calls is `initFbxSdkManager`, `loadScene`, any number of queries, `destroyFbxSdkManager`; the destructor
-/// makes up for a missing last one. A context belongs to one thread at a time; contexts share nothing.
+/// The order of calls is `initFbxSdkManager`, `loadScene`, any number of queries, `destroyFbxSdkManager`; the
+/// destructor makes up for a missing last one. A context belongs to one thread at a time; contexts share nothing.
 ///
 /// An operation whose result is a success or a failure sets `lastError()`; one whose false is an answer (a walk that
 /// found nothing, a mesh without deformers) leaves it alone. Scene objects are passed as pointers of the platform and
@@ -54,7 +54,8 @@ public:
 
     // ---- Manager, scene and loading ----
 
-    /// A manager with one empty scene; true at once when there is one already. False when there is no manager to be had.
+    /// A manager with one empty scene; true at once when there is one already. False when there is no manager to be
+    /// had.
     bool initFbxSdkManager();
 
     /// False when the context is not initialised.

@@ -60,8 +60,8 @@ bool read(const Fbx& fbx, TnFbxReadInfo& info, Object** objects, int& count) {
     }
 
     const ReaderRow<Object>& row = kReader<Object>;
-    count = fbx.getNumberOfObjects((sdk.*row.candidateCount)(), info.getAllObjects(), row.mask, info.getObjectName(),
-                                   sdk);
+    count =
+        fbx.getNumberOfObjects((sdk.*row.candidateCount)(), info.getAllObjects(), row.mask, info.getObjectName(), sdk);
     bool result = succeed();
     if (count >= 1) {
         *objects = new Object[static_cast<std::size_t>(count)];

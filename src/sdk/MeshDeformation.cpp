@@ -18,7 +18,6 @@
 namespace Tarnell::Fbx {
 
 using detail::fail;
-using detail::succeed;
 
 namespace {
 
@@ -204,7 +203,7 @@ void FbxSdk::getDeformedControlPoints(fbxsdk::FbxNode* node, fbxsdk::FbxMesh* me
         return;
     }
     const Point* source = mesh->GetControlPoints();
-    delete[] *points;
+    delete[] * points;
     *points = nullptr;
     *points = new Point[static_cast<std::size_t>(count)];
     std::copy_n(source, count, *points);
@@ -271,8 +270,8 @@ void FbxSdk::computeShapeDeformation(fbxsdk::FbxNode* /*node*/, fbxsdk::FbxMesh*
     }
 }
 
-void FbxSdk::computeClusterDeformation(fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxMesh* mesh,
-                                       fbxsdk::FbxTime& time, fbxsdk::FbxVector4* points) {
+void FbxSdk::computeClusterDeformation(fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
+                                       fbxsdk::FbxVector4* points) {
     if (mesh == nullptr || points == nullptr) {
         return;
     }
@@ -305,10 +304,10 @@ bool FbxSdk::openClosePointCacheData(fbxsdk::FbxScene* scene, bool open) {
                 cache->CloseFile();
             }
         } else if (!cache->IsOpen() && !cache->OpenFileForRead()) { // instances share a cache, which is open then
-            deformer->Active.Set(false); // the mesh then reads without its cache
+            deformer->Active.Set(false);                            // the mesh then reads without its cache
         }
     }
-    return succeed();
+    return true; // closing comes after the work, whose failure stays noted
 }
 
 void FbxSdk::matrixScale(fbxsdk::FbxAMatrix& matrix, double factor) { scaleElements(matrix, factor); }

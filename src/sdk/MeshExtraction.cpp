@@ -90,9 +90,9 @@ void fillLayout(const fbxsdk::FbxMesh& source, TnFbxMesh& mesh) {
 /// The normals of a layer; whether it has any.
 bool fillNormals(fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh) {
     const detail::LayerNormals normals(source, layer);
-    const fbxsdk::FbxVector4 missing(
-        static_cast<double>(TnFbxMesh::kDefaultMeshNX), static_cast<double>(TnFbxMesh::kDefaultMeshNY),
-        static_cast<double>(TnFbxMesh::kDefaultMeshNZ));
+    const fbxsdk::FbxVector4 missing(static_cast<double>(TnFbxMesh::kDefaultMeshNX),
+                                     static_cast<double>(TnFbxMesh::kDefaultMeshNY),
+                                     static_cast<double>(TnFbxMesh::kDefaultMeshNZ));
     bool found = false;
     forEachCorner(source, [&](const Corner& corner) {
         const std::optional<fbxsdk::FbxVector4> stored = normals.at(corner);

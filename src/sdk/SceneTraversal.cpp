@@ -122,8 +122,8 @@ struct Kind {
 };
 
 /// Readers whose arguments are the common ones.
-template <class Object, bool (FbxSdk::*kReader)(TnFbxTime&, bool, bool, float, fbxsdk::FbxNode*, Object&,
-                                                fbxsdk::FbxAMatrix&)>
+template <class Object,
+          bool (FbxSdk::*kReader)(TnFbxTime&, bool, bool, float, fbxsdk::FbxNode*, Object&, fbxsdk::FbxAMatrix&)>
 bool readPlain(FbxSdk& sdk, TnFbxTime& time, const ReadFlags& flags, fbxsdk::FbxNode& node, Object& object,
                fbxsdk::FbxAMatrix& geometric) {
     return (sdk.*kReader)(time, flags.globalTransform, flags.useSampleRate, flags.sampleRate, &node, object, geometric);
@@ -137,8 +137,8 @@ bool readCamera(FbxSdk& sdk, TnFbxTime& time, const ReadFlags& flags, fbxsdk::Fb
 
 bool readMesh(FbxSdk& sdk, TnFbxTime& time, const ReadFlags& flags, fbxsdk::FbxNode& node, TnFbxMesh& mesh,
               fbxsdk::FbxAMatrix& geometric) {
-    return sdk.getMesh(time, flags.globalTransform, flags.useSampleRate, flags.sampleRate, &node,
-                       flags.transformPoints, mesh, geometric);
+    return sdk.getMesh(time, flags.globalTransform, flags.useSampleRate, flags.sampleRate, &node, flags.transformPoints,
+                       mesh, geometric);
 }
 
 template <class Object>
@@ -157,9 +157,9 @@ template <>
 constexpr Kind<TnFbxNull> kKind<TnFbxNull> = {kNoAttribute | bitOf(Attribute::eNull), true,
                                               readPlain<TnFbxNull, &FbxSdk::getNull>};
 template <>
-constexpr Kind<TnFbxTransform> kKind<TnFbxTransform> = {
-    kNoAttribute | bitOf(Attribute::eNull) | bitOf(Attribute::eMarker) | bitOf(Attribute::eMesh), true,
-    readPlain<TnFbxTransform, &FbxSdk::getTransform>};
+constexpr Kind<TnFbxTransform> kKind<TnFbxTransform> = {kNoAttribute | bitOf(Attribute::eNull) |
+                                                            bitOf(Attribute::eMarker) | bitOf(Attribute::eMesh),
+                                                        true, readPlain<TnFbxTransform, &FbxSdk::getTransform>};
 
 /// The state of one walk: what to read and where to put it.
 template <class Object>
@@ -327,8 +327,7 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     bool found = false;
     const ReadFlags flags = {info.getGlobalTransform(), info.getUseSampleFPS(), info.getSampleFPS(),
                              info.getComputeCameraRotation(), info.getTransformPoints()};
-    const Walk<Object> walk = {time,    flags, info.getAllObjects(), info.getObjectName(),
-                               objects, count, index,                found};
+    const Walk<Object> walk = {time, flags, info.getAllObjects(), info.getObjectName(), objects, count, index, found};
     bool result = succeed();
     fbxsdk::FbxNode* root = mScene->GetRootNode();
     for (int i = 0; root != nullptr && result && !found && i < root->GetChildCount(); ++i) {
@@ -346,7 +345,8 @@ bool FbxSdk::getTransforms(TnFbxReadInfo& info, TnFbxTransform* transforms, int 
     return readList(info, transforms, count);
 }
 
-/// False when the array ends before the producer cameras do, which an array of `getNumberOfCameras` elements never does.
+/// False when the array ends before the producer cameras do, which an array of `getNumberOfCameras` elements never
+/// does.
 bool FbxSdk::readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count, int& index) {
     const fbxsdk::FbxGlobalCameraSettings& settings = ensureProducers(*mScene);
     for (const ProducerRow& row : kProducers) {
@@ -429,8 +429,8 @@ namespace {
 
 /// The deformer's Maya cache; null when it has none.
 fbxsdk::FbxCache* mayaCacheOf(fbxsdk::FbxMesh& mesh) {
-    auto* deformer = fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(
-        mesh.GetDeformer(0, fbxsdk::FbxDeformer::eVertexCache));
+    auto* deformer =
+        fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(mesh.GetDeformer(0, fbxsdk::FbxDeformer::eVertexCache));
     fbxsdk::FbxCache* cache = deformer != nullptr ? deformer->GetCache() : nullptr;
     return cache != nullptr && cache->GetCacheFileFormat() == fbxsdk::FbxCache::eMayaCache ? cache : nullptr;
 }

@@ -165,8 +165,7 @@ bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, con
         createImportSettings(manager);
     }
     const bool imported = importer->Import(scene, /*pNonBlocking*/ false);
-    const bool result =
-        imported ? succeed() : fail(reasonFor(fileName, importer->GetStatus().GetErrorString()));
+    const bool result = imported ? succeed() : fail(reasonFor(fileName, importer->GetStatus().GetErrorString()));
     importer->Destroy(/*pRecursive*/ false);
     return result;
 }

@@ -4,6 +4,8 @@
 // Loads a file the way the library does, but stops before the conversion to read what the file stores.
 #include "LoadedFile.h"
 
+#include "Utf8.h"
+
 #include <map>
 #include <span>
 
@@ -121,7 +123,7 @@ void LoadedFile::collectNodes(FbxNode& parent, int parentIndex) {
     for (int i = 0; i < parent.GetChildCount(); ++i) {
         FbxNode* child = parent.GetChild(i);
         const int index = static_cast<int>(mNodes.size());
-        mNodes.push_back({child, parentIndex, {}, {}, {}, false});
+        mNodes.push_back({child, withoutInvalidUtf8(child->GetName()), parentIndex, {}, {}, {}, false});
         collectNodes(*child, index);
     }
 }
@@ -129,9 +131,9 @@ void LoadedFile::collectNodes(FbxNode& parent, int parentIndex) {
 void LoadedFile::collectProducerCameras() {
     FbxGlobalCameraSettings& settings = mScene->GlobalCameraSettings();
     const auto add = [&](FbxNodeAttribute* attribute) {
-        if (attribute != nullptr && attribute->GetNode() != nullptr) {
-            mProducers.push_back({attribute->GetNode(), -1, {}, {}, {}, false});
-        }
+        FbxNode* node = attribute == nullptr ? nullptr : attribute->GetNode();
+        if (node != nullptr)
+            mProducers.push_back({node, withoutInvalidUtf8(node->GetName()), -1, {}, {}, {}, false});
     };
     for (const ProducerCamera camera : kProducerCameras)
         add((settings.*camera)());
@@ -193,7 +195,7 @@ void LoadedFile::matchReference() {
     std::vector<std::string> paths;
     for (const SceneNode& entry : mNodes) {
         const std::string parent = entry.parent < 0 ? "" : paths[static_cast<std::size_t>(entry.parent)];
-        paths.push_back(names.add(parent, entry.node->GetName()));
+        paths.push_back(names.add(parent, entry.name));
         byPath[paths.back()] = &entry;
     }
 
@@ -207,7 +209,7 @@ void LoadedFile::matchReference() {
             mNodeOfReference[i] = found->second;
         } else if (node.parent < 0) {
             for (const SceneNode& producer : mProducers) {
-                if (node.name == producer.node->GetName())
+                if (node.name == producer.name)
                     mNodeOfReference[i] = &producer;
             }
         }

@@ -18,6 +18,7 @@ namespace conformance {
 /// A node of the scene, with what has to be read before the conversion changes it.
 struct SceneNode {
     fbxsdk::FbxNode* node = nullptr;
+    std::string name;             ///< with U+FFFD for what is no UTF-8, as references have it
     int parent = -1;              ///< index in the same list
     NamedNumbers curves;          ///< as stored: the sums over the layers, per frame of the reference
     NamedNumbers camera, light;   ///< as stored

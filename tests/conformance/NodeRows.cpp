@@ -68,7 +68,7 @@ std::vector<Description> referenceTree(const LoadedFile& file) {
 std::vector<Description> sceneTree(const LoadedFile& file) {
     std::vector<Description> tree;
     for (const SceneNode& entry : file.nodes()) {
-        tree.push_back({entry.node->GetName(), kindOf(*entry.node), entry.parent});
+        tree.push_back({entry.name, kindOf(*entry.node), entry.parent});
     }
     return tree;
 }

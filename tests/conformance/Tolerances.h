@@ -11,6 +11,8 @@ namespace conformance {
 
 /// References print nine significant digits.
 constexpr double kStoredTolerance = 1e-8;
+/// The same for whole numbers, which are exact up to a hundred million then.
+constexpr double kCountTolerance = 5e-9;
 /// Curve values are floats (6e-8), and a channel is in degrees: a turn of 360° is off by 4e-7 radians, which the levers
 /// of a dozen nested nodes multiply.
 constexpr double kEvaluatedTolerance = 1e-5;

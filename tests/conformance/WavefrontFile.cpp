@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The format has neither units nor axes; each application has its habit, and its signature in the first lines.
+// Lines of points and faces, and what comments say about order and precision.
 #include "WavefrontFile.h"
 
 #include <charconv>
@@ -14,41 +14,25 @@
 namespace conformance {
 namespace {
 
-struct Habit {
-    std::string_view signature;
-    bool inFileUnits, inFileAxes;
-};
-
-constexpr Habit kHabits[] = {
-    {"This file uses centimeters", false, false}, // Maya
-    {"Blender v", true, false},
-    {"3ds Max Wavefront", true, true},
-    {"Max2Obj", true, true},
-    {"Created with Kaydara FBX", true, true},
-};
-
+/// 3ds Max numbers points anew; other files say of themselves that their order is another one.
+constexpr std::string_view kSignsOfOtherOrder[] = {"3ds Max Wavefront", "bad_order"};
 constexpr std::string_view kTolerance = "tolerance=";
-constexpr std::string_view kOtherOrder = "bad_order";
 
 void readComment(std::string_view line, WavefrontFile& file) {
-    for (const Habit& habit : kHabits) {
-        if (line.find(habit.signature) == std::string_view::npos)
-            continue;
-        file.inFileUnits = habit.inFileUnits;
-        file.inFileAxes = habit.inFileAxes;
+    for (const std::string_view sign : kSignsOfOtherOrder) {
+        if (line.find(sign) != std::string_view::npos)
+            file.inOtherOrder = true;
     }
-    if (line.find(kOtherOrder) != std::string_view::npos)
-        file.inOtherOrder = true;
     if (const std::size_t at = line.find(kTolerance); at != std::string_view::npos) {
         file.tolerance = std::max(file.tolerance, std::stod(std::string(line.substr(at + kTolerance.size()))));
     }
 }
 
-/// Half a unit of the last digit of "1.2500" is 0.00005.
+/// A unit of the last digit: 0.0001 for "1.2500". Half of it is lost here, and the FBX file's number was rounded too.
 double printedPrecision(std::string_view number) {
     const std::size_t point = number.find('.');
     const std::size_t decimals = point == std::string_view::npos ? 0 : number.size() - point - 1;
-    return 0.5 * std::pow(10.0, -static_cast<double>(decimals));
+    return std::pow(10.0, -static_cast<double>(decimals));
 }
 
 Point readPoint(std::istringstream& words, WavefrontFile& file) {

@@ -1,8 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Wavefront files as far as points go: one block of points per object, in the converted space of the scenes that they
-// are compared with.
+// Wavefront files as far as points go: one block of points per object.
 #pragma once
 
 #include "MeshPoints.h"
@@ -21,10 +20,8 @@ struct WavefrontBlock {
 
 struct WavefrontFile {
     std::vector<WavefrontBlock> blocks;
-    bool inFileUnits = false;  ///< else centimetres
-    bool inFileAxes = false;   ///< else Y up and right-handed
     bool inOtherOrder = false; ///< the points are not in the order of the FBX file's
-    double tolerance = 0;      ///< half a unit of the last digit printed, or what the file says of itself
+    double tolerance = 0;      ///< a unit of the last digit printed, or what the file says of itself
 };
 
 WavefrontFile readWavefront(const std::filesystem::path& path);

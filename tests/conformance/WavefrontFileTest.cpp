@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Blocks, names and habits of Wavefront files.
+// Blocks, names and precision of Wavefront files.
 #include "WavefrontFile.h"
 
 #include "../support/TemporaryFolder.h"
@@ -30,15 +30,14 @@ TEST(WavefrontFile, NamesABlockByTheGroupOfItsFirstFace) {
     EXPECT_THAT(file.blocks[1].points, ElementsAre(Point{7, 8, 9}));
 }
 
-TEST(WavefrontFile, TellsUnitsAndAxesByTheApplication) {
-    EXPECT_FALSE(parsed("# This file uses centimeters as units for non-parametric coordinates.\n").inFileUnits);
-    EXPECT_TRUE(parsed("# Blender v2.93.1 OBJ File: ''\n").inFileUnits);
-    EXPECT_FALSE(parsed("# Blender v2.93.1 OBJ File: ''\n").inFileAxes);
-    EXPECT_TRUE(parsed("# 3ds Max Wavefront OBJ Exporter v0.99\n").inFileAxes);
+TEST(WavefrontFile, TellsWhenPointsAreInAnotherOrder) {
+    EXPECT_FALSE(parsed("# Blender v2.93.1 OBJ File: ''\n").inOtherOrder);
+    EXPECT_TRUE(parsed("# 3ds Max Wavefront OBJ Exporter v0.99\n").inOtherOrder);
+    EXPECT_TRUE(parsed("# bad_order\n").inOtherOrder);
 }
 
-TEST(WavefrontFile, ToleratesHalfAUnitOfTheLastDigit) {
-    EXPECT_THAT(parsed("v 1.2500 2.0000 3.0000\n").tolerance, DoubleEq(0.00005));
+TEST(WavefrontFile, ToleratesAUnitOfTheLastDigit) {
+    EXPECT_THAT(parsed("v 1.2500 2.0000 3.0000\n").tolerance, DoubleEq(0.0001));
     EXPECT_THAT(parsed("# tolerance=0.01\nv 1.2500 2.0000 3.0000\n").tolerance, DoubleEq(0.01));
 }
 

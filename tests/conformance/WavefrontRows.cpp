@@ -14,13 +14,20 @@ namespace {
 
 using namespace fbxsdk;
 
-/// The file's own unit and axes to centimetres and Y up.
-FbxAMatrix wavefrontToScene(const WavefrontFile& wavefront, const Reference& reference) {
+/// The format has neither units nor axes. Applications save either what they see, or the file's unit, or unit and axes
+/// of the file.
+struct Space {
+    bool inFileUnits, inFileAxes;
+};
+
+constexpr Space kSpaces[] = {{false, false}, {true, false}, {true, true}};
+
+FbxAMatrix toScene(const Space& space, const Reference& reference) {
     FbxAMatrix matrix;
     constexpr double kCentimetresPerMetre = 100.0;
-    if (wavefront.inFileAxes && reference.axes == std::array{0, 4, 3})
+    if (space.inFileAxes && reference.axes == std::array{0, 4, 3})
         matrix.SetR(FbxVector4(-90, 0, 0));
-    const double scale = wavefront.inFileUnits ? reference.fileUnitMeters * kCentimetresPerMetre : 1.0;
+    const double scale = space.inFileUnits ? reference.fileUnitMeters * kCentimetresPerMetre : 1.0;
     matrix.SetS(FbxVector4(scale, scale, scale));
     return matrix;
 }
@@ -116,30 +123,67 @@ bool isWanted(const ReferenceNode& node, bool deformed) {
     return node.mesh && node.mesh->blendShapes == 0 && (node.mesh->skins + node.mesh->caches > 0) == deformed;
 }
 
-void compareSibling(LoadedFile& file, const WavefrontSibling& sibling, bool deformed, Findings& findings) {
-    const WavefrontFile wavefront = readWavefront(sibling.path);
-    const Reference& reference = file.reference();
-    const FbxAMatrix toScene = wavefrontToScene(wavefront, reference);
-    const double tolerance = wavefront.tolerance * toScene.GetS()[0];
-    const FbxTime time = sibling.frame ? timeOfSeconds(*sibling.frame / reference.fps) : FBXSDK_TIME_INFINITE;
-    const auto compare = wavefront.inOtherOrder ? compareAsSets : compareInOrder;
+/// A node's points here and in the Wavefront file, still in the latter's space.
+struct Pair {
+    const std::string* name;
+    std::vector<Point> actual;
+    const std::vector<Point>* wavefront;
+};
 
-    for (std::size_t i = 0; i < reference.nodes.size(); ++i) {
-        if (!isWanted(reference.nodes[i], deformed))
+/// Frames of a clip that is not the scene's first count from the clip's start.
+FbxTime timeOf(const WavefrontSibling& sibling, const Reference& reference) {
+    if (!sibling.frame)
+        return FBXSDK_TIME_INFINITE; // the values as stored
+    const double seconds = *sibling.frame / reference.fps;
+    const double start = reference.stacks.empty() ? 0.0 : reference.stacks[0].begin;
+    return timeOfSeconds(seconds < start ? start + seconds : seconds);
+}
+
+std::vector<Pair> pairsOf(LoadedFile& file, const WavefrontFile& wavefront, const FbxTime& time, bool deformed) {
+    std::vector<Pair> pairs;
+    const std::vector<ReferenceNode>& nodes = file.reference().nodes;
+    for (std::size_t i = 0; i < nodes.size(); ++i) {
+        if (!isWanted(nodes[i], deformed))
             continue;
         const WavefrontBlock* block = blockOf(wavefront, file, i);
         if (block == nullptr)
             continue; // the application left the node out
         const SceneNode* entry = file.nodeOf(i);
         FbxMesh* mesh = entry ? entry->node->GetMesh() : nullptr;
-        std::string difference = "no mesh";
-        if (mesh) {
-            difference =
-                compare(worldPoints(file, *entry->node, *mesh, time), transformed(toScene, block->points), tolerance);
-        }
-        findings.compare(difference.empty(), [&] {
-            return sibling.path.filename().string() + " \"" + reference.nodes[i].name + "\" " + difference;
-        });
+        std::vector<Point> points;
+        if (mesh)
+            points = worldPoints(file, *entry->node, *mesh, time);
+        pairs.push_back({&nodes[i].name, std::move(points), &block->points});
+    }
+    return pairs;
+}
+
+/// One text per pair, empty where they agree.
+std::vector<std::string> differencesIn(const Space& space, const Reference& reference, const WavefrontFile& wavefront,
+                                       const std::vector<Pair>& pairs) {
+    const FbxAMatrix matrix = toScene(space, reference);
+    const double tolerance = wavefront.tolerance * matrix.GetS()[0];
+    const auto compare = wavefront.inOtherOrder ? compareAsSets : compareInOrder;
+    std::vector<std::string> differences;
+    for (const Pair& pair : pairs) {
+        differences.push_back(compare(pair.actual, transformed(matrix, *pair.wavefront), tolerance));
+    }
+    return differences;
+}
+
+/// All meshes of a file stand in one space: the one in which most of them agree.
+void compareSibling(LoadedFile& file, const WavefrontSibling& sibling, bool deformed, Findings& findings) {
+    const WavefrontFile wavefront = readWavefront(sibling.path);
+    const std::vector<Pair> pairs = pairsOf(file, wavefront, timeOf(sibling, file.reference()), deformed);
+    std::vector<std::string> best;
+    for (const Space& space : kSpaces) {
+        std::vector<std::string> differences = differencesIn(space, file.reference(), wavefront, pairs);
+        if (best.empty() || std::ranges::count(differences, "") > std::ranges::count(best, ""))
+            best.swap(differences);
+    }
+    for (std::size_t i = 0; i < pairs.size(); ++i) {
+        findings.compare(best[i].empty(),
+                         [&] { return sibling.path.filename().string() + " \"" + *pairs[i].name + "\" " + best[i]; });
     }
 }
 

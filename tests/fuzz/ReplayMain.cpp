@@ -5,6 +5,10 @@
 // mutations of each, which depend on nothing but the file's name and bytes.
 //
 //     fuzz_Name [--mutations COUNT] PATH...
+//     fuzz_Name [--mutations COUNT] --corpus FOLDER
+//
+// The second form takes a folder of real files, $TARNELL_CORPUS rather than the one named, and of these 30 binary and
+// 30 ASCII ones, which are also cut off in 100 places each. Without such a folder it says so and ends with 77.
 #include <algorithm>
 #include <cstdint>
 #include <cstdio>
@@ -100,6 +104,57 @@ void runMutations(const fs::path& path, const std::string& original, int count) 
     }
 }
 
+constexpr std::size_t kCorpusFilesPerContainer = 30;
+constexpr std::size_t kCuts = 100;
+/// Large files only cost time: their damage is that of small ones.
+constexpr std::size_t kLargestCorpusFile = 300000;
+constexpr int kSkipped = 77;
+
+/// Every n-th file of a container, so that all writers and versions are among them.
+std::vector<fs::path> sampleOf(const std::vector<fs::path>& files) {
+    std::vector<fs::path> sample;
+    const std::size_t count = std::min(kCorpusFilesPerContainer, files.size());
+    for (std::size_t i = 0; i < count; ++i) {
+        sample.push_back(files[i * files.size() / count]);
+    }
+    return sample;
+}
+
+std::vector<fs::path> corpusFiles(const fs::path& folder) {
+    std::vector<fs::path> binary, ascii;
+    for (const fs::path& path : filesIn(folder)) {
+        if (path.extension() == ".fbx" && fs::file_size(path) <= kLargestCorpusFile) {
+            (readFile(path).starts_with("Kaydara") ? binary : ascii).push_back(path);
+        }
+    }
+    std::vector<fs::path> files = sampleOf(binary);
+    for (const fs::path& path : sampleOf(ascii)) {
+        files.push_back(path);
+    }
+    return files;
+}
+
+int runCorpus(const char* fallback, int mutations) {
+    const char* named = std::getenv("TARNELL_CORPUS");
+    const fs::path folder = named ? named : fallback;
+    if (!fs::is_directory(folder)) {
+        std::printf("corpus not found: its files are skipped\n");
+        return kSkipped;
+    }
+    std::size_t inputs = 0;
+    for (const fs::path& path : corpusFiles(folder)) {
+        const std::string bytes = readFile(path);
+        run(bytes);
+        for (std::size_t i = 0; i < kCuts; ++i) {
+            run(bytes.substr(0, bytes.size() * i / kCuts));
+        }
+        runMutations(path, bytes, mutations);
+        inputs += 1 + kCuts + static_cast<std::size_t>(mutations);
+    }
+    std::printf("%zu inputs\n", inputs);
+    return inputs > 0 ? EXIT_SUCCESS : EXIT_FAILURE;
+}
+
 } // namespace
 
 int main(int argumentCount, char** arguments) {
@@ -109,6 +164,9 @@ int main(int argumentCount, char** arguments) {
         if (std::strcmp(arguments[i], "--mutations") == 0 && i + 1 < argumentCount) {
             mutations = std::atoi(arguments[++i]);
             continue;
+        }
+        if (std::strcmp(arguments[i], "--corpus") == 0 && i + 1 < argumentCount) {
+            return runCorpus(arguments[i + 1], mutations);
         }
         if (!fs::exists(arguments[i])) {
             std::fprintf(stderr, "%s: not there\n", arguments[i]);

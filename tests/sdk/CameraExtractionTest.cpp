@@ -14,6 +14,7 @@
 namespace Tarnell::Fbx {
 namespace {
 
+using test::samplesOf;
 using test::TestScene;
 using Camera = TnFbxCamera;
 using Samples = std::vector<float>;

@@ -13,6 +13,7 @@
 namespace Tarnell::Fbx {
 namespace {
 
+using test::samplesOf;
 using test::TestScene;
 using Light = TnFbxLight;
 using Marker = TnFbxMarker;
@@ -139,12 +140,9 @@ TEST(LightExtraction, MapsDecays) {
         int fbx;
         Light::EFbxLightDecayType type;
     };
-    const Row rows[] = {{0, Light::kFbxLightDecayNone},
-                        {1, Light::kFbxLightDecayLinear},
-                        {2, Light::kFbxLightDecayQuadratic},
-                        {3, Light::kFbxLightDecayCubic},
-                        {4, Light::kFbxLightDecayNone},
-                        {-1, Light::kFbxLightDecayNone}};
+    const Row rows[] = {{0, Light::kFbxLightDecayNone},      {1, Light::kFbxLightDecayLinear},
+                        {2, Light::kFbxLightDecayQuadratic}, {3, Light::kFbxLightDecayCubic},
+                        {4, Light::kFbxLightDecayNone},      {-1, Light::kFbxLightDecayNone}};
     for (const Row& row : rows) {
         TestScene scene;
         fbxsdk::FbxNode* node = scene.add<fbxsdk::FbxLight>("light");

@@ -103,26 +103,28 @@ ElementType* makeElement(fbxsdk::FbxNode* node, Element::EMappingMode mapping, E
 
 void setNormals(fbxsdk::FbxNode* node, Element::EMappingMode mapping, Element::EReferenceMode reference,
                 const std::vector<FbxVector4>& values, const std::vector<int>& indices = {}, int layer = 0) {
-    layerOf(node, layer).SetNormals(
-        makeElement<fbxsdk::FbxLayerElementNormal>(node, mapping, reference, values, indices));
+    layerOf(node, layer)
+        .SetNormals(makeElement<fbxsdk::FbxLayerElementNormal>(node, mapping, reference, values, indices));
 }
 
 void setUVs(fbxsdk::FbxNode* node, Element::EMappingMode mapping, Element::EReferenceMode reference,
             const std::vector<FbxVector2>& values, const std::vector<int>& indices = {}, int layer = 0) {
-    layerOf(node, layer).SetUVs(makeElement<fbxsdk::FbxLayerElementUV>(node, mapping, reference, values, indices),
-                                Element::eTextureDiffuse);
+    layerOf(node, layer)
+        .SetUVs(makeElement<fbxsdk::FbxLayerElementUV>(node, mapping, reference, values, indices),
+                Element::eTextureDiffuse);
 }
 
 void setColours(fbxsdk::FbxNode* node, Element::EMappingMode mapping, Element::EReferenceMode reference,
                 const std::vector<FbxColor>& values, const std::vector<int>& indices = {}, int layer = 0) {
-    layerOf(node, layer).SetVertexColors(
-        makeElement<fbxsdk::FbxLayerElementVertexColor>(node, mapping, reference, values, indices));
+    layerOf(node, layer)
+        .SetVertexColors(makeElement<fbxsdk::FbxLayerElementVertexColor>(node, mapping, reference, values, indices));
 }
 
 void setMaterials(fbxsdk::FbxNode* node, Element::EMappingMode mapping, Element::EReferenceMode reference,
                   const std::vector<int>& indices = {}, int layer = 0) {
-    layerOf(node, layer).SetMaterials(makeElement<fbxsdk::FbxLayerElementMaterial>(
-        node, mapping, reference, std::vector<fbxsdk::FbxSurfaceMaterial*>(), indices));
+    layerOf(node, layer)
+        .SetMaterials(makeElement<fbxsdk::FbxLayerElementMaterial>(
+            node, mapping, reference, std::vector<fbxsdk::FbxSurfaceMaterial*>(), indices));
 }
 
 template <class Material>
@@ -420,12 +422,13 @@ TEST(MeshUVs, WithOtherModesAreNone) {
         Element::EMappingMode mapping;
         Element::EReferenceMode reference;
     };
-    for (const Row& row : {Row{Element::eByPolygon, Element::eDirect}, Row{Element::eAllSame, Element::eDirect},
-                           Row{Element::eByPolygonVertex, Element::eIndex},
-                           Row{Element::eByControlPoint, Element::eIndex}}) {
+    for (const Row& row :
+         {Row{Element::eByPolygon, Element::eDirect}, Row{Element::eAllSame, Element::eDirect},
+          Row{Element::eByPolygonVertex, Element::eIndex}, Row{Element::eByControlPoint, Element::eIndex}}) {
         TestScene scene;
         fbxsdk::FbxNode* node = addTwoPolygons(scene);
-        setUVs(node, row.mapping, row.reference, std::vector<FbxVector2>(7, FbxVector2(0.5, 0.5)), {0, 1, 2, 3, 4, 5, 6});
+        setUVs(node, row.mapping, row.reference, std::vector<FbxVector2>(7, FbxVector2(0.5, 0.5)),
+               {0, 1, 2, 3, 4, 5, 6});
 
         const TnFbxMesh mesh = readMesh(scene, node);
 
@@ -503,7 +506,8 @@ TEST(MeshColours, WithOtherModesAreNoneAndHideTheMaterials) {
 TEST(MeshColours, OfTheLastLayerAreKept) {
     TestScene scene;
     fbxsdk::FbxNode* node = addTwoPolygons(scene);
-    setColours(node, Element::eByControlPoint, Element::eDirect, std::vector<FbxColor>(5, FbxColor(0.1, 0.1, 0.1, 0.1)));
+    setColours(node, Element::eByControlPoint, Element::eDirect,
+               std::vector<FbxColor>(5, FbxColor(0.1, 0.1, 0.1, 0.1)));
     setColours(node, Element::eByControlPoint, Element::eDirect, std::vector<FbxColor>(5, FbxColor(0.2, 0.2, 0.2, 0.2)),
                {}, /*layer*/ 1);
 
@@ -513,7 +517,8 @@ TEST(MeshColours, OfTheLastLayerAreKept) {
 TEST(MeshColours, AreOverwrittenByALastLayerThatHasNone) {
     TestScene scene;
     fbxsdk::FbxNode* node = addTwoPolygons(scene);
-    setColours(node, Element::eByControlPoint, Element::eDirect, std::vector<FbxColor>(5, FbxColor(0.1, 0.1, 0.1, 0.1)));
+    setColours(node, Element::eByControlPoint, Element::eDirect,
+               std::vector<FbxColor>(5, FbxColor(0.1, 0.1, 0.1, 0.1)));
     layerOf(node, 1);
 
     const TnFbxMesh mesh = readMesh(scene, node);

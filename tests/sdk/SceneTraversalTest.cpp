@@ -462,8 +462,8 @@ TEST(Walkers, StartAtTheNodeItselfAndMoveTheIndexOn) {
     int index = 1;
     bool found = false;
 
-    EXPECT_TRUE(scene.sdk.getTransformsRecursive(time, false, false, 0.0f, true, "", top, index, transforms.data(), 4,
-                                                 found));
+    EXPECT_TRUE(
+        scene.sdk.getTransformsRecursive(time, false, false, 0.0f, true, "", top, index, transforms.data(), 4, found));
 
     EXPECT_EQ(index, 3);
     EXPECT_FALSE(found);
@@ -478,8 +478,8 @@ TEST(Walkers, ReadANamedObjectIntoTheFirstElementWhateverTheIndex) {
     int index = 2;
     bool found = false;
 
-    EXPECT_TRUE(scene.sdk.getNullsRecursive(time, false, false, 0.0f, false, "d", scene.scene->GetRootNode()->GetChild(0),
-                                            index, nulls.data(), 3, found));
+    EXPECT_TRUE(scene.sdk.getNullsRecursive(time, false, false, 0.0f, false, "d",
+                                            scene.scene->GetRootNode()->GetChild(0), index, nulls.data(), 3, found));
 
     EXPECT_TRUE(found);
     EXPECT_EQ(index, 2);
@@ -524,8 +524,8 @@ TEST(Walkers, FindNothingBelowANullNode) {
     int index = 0;
     bool found = false;
 
-    EXPECT_TRUE(scene.sdk.getTransformsRecursive(time, false, false, 0.0f, true, "", nullptr, index, &transform, 1,
-                                                 found));
+    EXPECT_TRUE(
+        scene.sdk.getTransformsRecursive(time, false, false, 0.0f, true, "", nullptr, index, &transform, 1, found));
     EXPECT_EQ(index, 0);
 }
 
@@ -540,8 +540,8 @@ TEST(Walkers, OfCamerasAndMeshesPassTheirOwnFlags) {
 
     TnFbxCamera readCamera;
     int index = 0;
-    EXPECT_TRUE(scene.sdk.getCamerasRecursive(time, false, false, 0.0f, /*computeCameraRotation*/ true, true, "", camera,
-                                              index, &readCamera, 1, found));
+    EXPECT_TRUE(scene.sdk.getCamerasRecursive(time, false, false, 0.0f, /*computeCameraRotation*/ true, true, "",
+                                              camera, index, &readCamera, 1, found));
     EXPECT_EQ(readCamera.getValue(TnFbxCamera::kFbxCameraLookAtPositionX), 9.0f);
 
     for (const bool transformPoints : {false, true}) {

@@ -19,6 +19,7 @@ namespace {
 
 using fbxsdk::FbxAMatrix;
 using fbxsdk::FbxVector4;
+using test::samplesOf;
 using test::TestScene;
 using Euler = fbxsdk::FbxEuler;
 using Samples = std::vector<float>;
@@ -146,8 +147,8 @@ TEST(ExtractMatrixRotation, GivesAnglesThatApplyInTheOrderZXY) {
     std::mt19937 random(1);
     std::uniform_real_distribution<double> turn(-80.0, 80.0);
     for (int i = 0; i < 1000; ++i) {
-        const FbxAMatrix matrix = rotation(0.0, turn(random), 0.0) * rotation(turn(random), 0.0, 0.0) *
-                                  rotation(0.0, 0.0, turn(random));
+        const FbxAMatrix matrix =
+            rotation(0.0, turn(random), 0.0) * rotation(turn(random), 0.0, 0.0) * rotation(0.0, 0.0, turn(random));
         const Angles angles = extract(matrix);
         const FbxAMatrix back = rotation(0.0, static_cast<double>(angles.y), 0.0) *
                                 rotation(static_cast<double>(angles.x), 0.0, 0.0) *

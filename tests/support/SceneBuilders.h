@@ -11,6 +11,7 @@
 #include <gtest/gtest.h>
 
 #include <initializer_list>
+#include <type_traits>
 #include <utility>
 #include <vector>
 
@@ -64,9 +65,10 @@ public:
         return node;
     }
 
-    /// Linear keys on one component of a property (null: a scalar property).
+    /// Linear keys on one component of a property (null: a scalar property), which becomes animatable if it is not.
     fbxsdk::FbxAnimCurve* key(fbxsdk::FbxProperty property, const char* component, std::initializer_list<Key> keys,
                               fbxsdk::FbxAnimLayer* on = nullptr) {
+        property.ModifyFlag(fbxsdk::FbxPropertyFlags::eAnimatable, true);
         fbxsdk::FbxAnimCurve* curve =
             property.GetCurve(on != nullptr ? on : layer, property.GetName(), component, true);
         EXPECT_NE(curve, nullptr);
@@ -128,24 +130,21 @@ inline fbxsdk::FbxNode* addTriangle(TestScene& scene, const char* name) {
     return node;
 }
 
-/// The values of a transform's channel over its own range.
-inline std::vector<float> samplesOf(const TnFbxTransform& transform, TnFbxTransform::EFbxTransformChannelType channel) {
-    std::vector<float> samples;
-    const TnFbxTime time = transform.getTransformTime(channel);
-    for (int frame = time.getStartFrame(); transform.getTransformAnimated(channel) && frame <= time.getEndFrame();
-         ++frame) {
-        samples.push_back(transform.getTransformValueAt(channel, static_cast<float>(frame)));
-    }
-    return samples;
-}
-
-/// The values of a camera's, light's or marker's channel over its own range.
+/// The values of an object's channel, one of its own or of its transform, over the channel's range.
 template <class Object, class Channel>
 std::vector<float> samplesOf(const Object& object, Channel channel) {
+    constexpr bool ofTransform = std::is_same_v<Channel, TnFbxTransform::EFbxTransformChannelType>;
     std::vector<float> samples;
-    const TnFbxTime time = object.getTime(channel);
-    for (int frame = time.getStartFrame(); object.getAnimated(channel) && frame <= time.getEndFrame(); ++frame) {
-        samples.push_back(object.getValueAt(channel, static_cast<float>(frame)));
+    if constexpr (ofTransform) {
+        const TnFbxTime time = object.getTransformTime(channel);
+        for (int f = time.getStartFrame(); object.getTransformAnimated(channel) && f <= time.getEndFrame(); ++f) {
+            samples.push_back(object.getTransformValueAt(channel, static_cast<float>(f)));
+        }
+    } else {
+        const TnFbxTime time = object.getTime(channel);
+        for (int f = time.getStartFrame(); object.getAnimated(channel) && f <= time.getEndFrame(); ++f) {
+            samples.push_back(object.getValueAt(channel, static_cast<float>(f)));
+        }
     }
     return samples;
 }

@@ -338,7 +338,9 @@ const std::vector<std::string>& dumpKinds() {
 }
 
 void printError(const std::string& file, const std::string& reason) {
-    std::cerr << "tarnell-fbx: " << file << ": " << reason << '\n';
+    // The library's sentences begin with the file already.
+    const bool named = reason.rfind(file + ": ", 0) == 0;
+    std::cerr << "tarnell-fbx: " << (named ? "" : file + ": ") << reason << '\n';
 }
 
 int dump(const DumpOptions& options) {

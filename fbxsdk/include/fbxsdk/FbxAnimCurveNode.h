@@ -48,6 +48,9 @@ public:
 
     /// Adds a channel; false when the name is taken.
     bool addChannel(const char* pName, double pValue);
+    /// Brings the channels into the order of a vector's components, whatever order a file had them in; those that are
+    /// missing are made with the component's value.
+    void arrangeChannels(const std::vector<double>& pComponents);
     [[nodiscard]] double channelValue(unsigned int pChannelId) const;
     void setChannelValue(unsigned int pChannelId, double pValue);
 

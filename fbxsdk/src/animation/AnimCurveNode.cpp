@@ -5,6 +5,7 @@
 #include <fbxsdk/FbxAnimCurveNode.h>
 
 #include <algorithm>
+#include <iterator>
 
 #include <fbxsdk/FbxAnimCurve.h>
 #include <fbxsdk/FbxScene.h>
@@ -188,6 +189,21 @@ bool FbxAnimCurveNode::addChannel(const char* pName, double pValue) {
     mChannels.push_back({pName, pValue, {}});
     ++GetFbxManager()->data().revision;
     return true;
+}
+
+void FbxAnimCurveNode::arrangeChannels(const std::vector<double>& pComponents) {
+    constexpr const char* kNames[][2] = {{"X", "R"}, {"Y", "G"}, {"Z", "B"}, {"W", "A"}};
+    for (std::size_t i = 0; i < std::min(pComponents.size(), std::size(kNames)); ++i) {
+        addChannel(GetChannelIndex(kNames[i][1]) < 0 ? kNames[i][0] : kNames[i][1], pComponents[i]);
+        const auto isComponent = [&](const Channel& channel) {
+            return channel.name == kNames[i][0] || channel.name == kNames[i][1];
+        };
+        const auto place = mChannels.begin() + static_cast<std::ptrdiff_t>(i);
+        const auto found = std::find_if(place, mChannels.end(), isComponent);
+        if (found != mChannels.end())
+            std::rotate(place, found, std::next(found));
+    }
+    ++GetFbxManager()->data().revision;
 }
 
 double FbxAnimCurveNode::channelValue(unsigned int pChannelId) const {

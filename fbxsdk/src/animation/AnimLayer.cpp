@@ -56,6 +56,8 @@ bool FbxAnimLayer::GetBlendModeBypass(EFbxType pType) const {
 FbxAnimCurveNode* FbxAnimLayer::CreateCurveNode(FbxProperty& pProperty) {
     if (FbxAnimCurveNode* existing = pProperty.GetCurveNode(this, false))
         return existing;
+    if (!pProperty.GetFlag(FbxPropertyFlags::eAnimatable))
+        return nullptr;
     FbxAnimCurveNode* node = FbxAnimCurveNode::CreateTypedCurveNode(pProperty, GetScene());
     if (!node)
         return nullptr;

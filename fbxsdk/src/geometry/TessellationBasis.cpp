@@ -77,9 +77,10 @@ bool isUsable(const KnotDirection& direction) {
     // At most the first order - 1 points come again.
     if (direction.knots.size() < fewest || direction.knots.size() >= fewest + order)
         return false;
-    return std::all_of(direction.knots.begin(), direction.knots.end(),
-                       [](double knot) { return std::isfinite(knot); }) &&
-           std::is_sorted(direction.knots.begin(), direction.knots.end());
+    const bool finite =
+        std::all_of(direction.knots.begin(), direction.knots.end(), [](double knot) { return std::isfinite(knot); });
+    return finite && std::is_sorted(direction.knots.begin(), direction.knots.end()) &&
+           std::isfinite(direction.knots.back() - direction.knots.front());
 }
 
 bool sameTerms(std::span<const BasisTerm> a, std::span<const BasisTerm> b, int points) {

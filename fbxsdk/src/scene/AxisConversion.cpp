@@ -5,6 +5,7 @@
 // is the old one seen from the new system. The turn enters as pre-rotation, so rotation curves stay as they are.
 #include <array>
 #include <cmath>
+#include <string>
 
 #include <fbxsdk/FbxAxisSystem.h>
 #include <fbxsdk/FbxCamera.h>
@@ -100,10 +101,46 @@ void turnRotation(FbxNode& node, const FbxAMatrix& turn) {
     node.SetRotationActive(true);
 }
 
+/// One bound of the translation: its value, and for each component whether it holds.
+struct Bound {
+    FbxDouble3 value;
+    std::array<bool, 3> holds{};
+};
+constexpr std::array<const char*, 3> kComponentNames = {"X", "Y", "Z"};
+
+Bound readBound(const FbxNode& node, const std::string& name) {
+    Bound bound{node.FindProperty(name.c_str()).Get<FbxDouble3>(), {}};
+    for (std::size_t i = 0; i < 3; ++i)
+        bound.holds[i] = node.FindProperty((name + kComponentNames[i]).c_str()).Get<FbxBool>();
+    return bound;
+}
+
+void writeBound(FbxNode& node, const std::string& name, const Bound& bound) {
+    node.FindProperty(name.c_str()).Set(bound.value);
+    for (std::size_t i = 0; i < 3; ++i)
+        node.FindProperty((name + kComponentNames[i]).c_str()).Set(bool{bound.holds[i]});
+}
+
+/// The limits turn with the translation; where a component changes its sign, the lower one becomes the upper one.
+void turnTranslationLimits(FbxNode& node, const SignedPermutation& turn) {
+    const std::array<Bound, 2> old = {readBound(node, "TranslationMin"), readBound(node, "TranslationMax")};
+    std::array<Bound, 2> turned;
+    for (std::size_t side = 0; side < 2; ++side) {
+        for (std::size_t i = 0; i < 3; ++i) {
+            const Bound& from = old[turn.sign[i] < 0 ? 1 - side : side];
+            turned[side].value[static_cast<int>(i)] = from.value[turn.source[i]] * turn.sign[i];
+            turned[side].holds[i] = from.holds[static_cast<std::size_t>(turn.source[i])];
+        }
+    }
+    writeBound(node, "TranslationMin", turned[0]);
+    writeBound(node, "TranslationMax", turned[1]);
+}
+
 /// M T Roff Rp … becomes T' Roff' Rp M …: the rotation offset takes up what the pivot would move.
 void turnNode(FbxNode& node, const SignedPermutation& turn) {
     constexpr auto kSet = FbxNode::eSourcePivot;
     detail::permuteAnimated(node.LclTranslation, turn);
+    turnTranslationLimits(node, turn);
     turnRotation(node, matrixOf(turn));
     const FbxVector4 pivot = node.GetRotationPivot(kSet);
     const FbxVector4 offset = node.GetRotationOffset(kSet);

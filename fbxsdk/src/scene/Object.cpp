@@ -17,7 +17,6 @@ FBXSDK_NAMESPACE_BEGIN
 
 namespace detail {
 extern const ClassInfo kFbxObjectInfo;
-extern const ClassInfo kFbxObjectInfo;
 constinit const ClassInfo kFbxObjectInfo{"FbxObject", nullptr, {}, &ManagerData::construct<FbxObject>};
 } // namespace detail
 constinit const FbxClassId FbxObject::ClassId{&detail::kFbxObjectInfo};
@@ -40,28 +39,23 @@ FbxObject::FbxObject(FbxManager& pManager, const detail::ClassInfo& pInfo)
 FbxObject::~FbxObject() { mData->manager->data().leave(*this); }
 
 void FbxObject::Destroy(bool pRecursive) {
-    // What every scene has goes with the scene only.
-    const auto isKept = [this](const FbxObject& object) {
+    std::vector<FbxObject*> doomed;
+    std::unordered_set<const FbxObject*> known;
+    const auto doom = [&](FbxObject& object) {
+        // What every scene has goes with the scene only.
         const FbxScene* scene = object.GetScene();
-        return scene && scene != this && scene->sceneData().isFixed(object);
+        const bool isKept = scene && scene != &object && !known.contains(scene) && scene->sceneData().isFixed(object);
+        if (!isKept && known.insert(&object).second)
+            doomed.push_back(&object);
     };
-    if (isKept(*this))
-        return;
-    std::vector<FbxObject*> doomed{this};
-    std::unordered_set<const FbxObject*> known{this};
-    const auto doom = [&](const detail::ConnectionPoint& source) {
-        if (source.property >= 0 || isKept(*source.object) || !known.insert(source.object).second)
-            return;
-        doomed.push_back(source.object);
-    };
-    for (std::size_t i = 0; pRecursive && i < doomed.size(); ++i) {
-        for (const detail::ConnectionPoint* source : doomed[i]->mData->plug.sources)
-            doom(*source);
-    }
-    // A scene takes its members along, and its members are its sources.
-    for (const detail::ConnectionPoint* source : mData->plug.sources) {
-        if (Is<FbxScene>() && source->object->GetScene() == this)
-            doom(*source);
+    doom(*this);
+    for (std::size_t i = 0; i < doomed.size(); ++i) {
+        // A scene takes its members along, and its members are its sources.
+        const auto* scene = FbxCast<FbxScene>(doomed[i]);
+        for (const detail::ConnectionPoint* source : doomed[i]->mData->plug.sources) {
+            if (source->property < 0 && (pRecursive || (scene && source->object->GetScene() == scene)))
+                doom(*source->object);
+        }
     }
     detail::ManagerData::destroyTogether(doomed);
 }
@@ -124,15 +118,13 @@ bool FbxObject::DisconnectDstObject(FbxObject* pObject) {
 }
 
 bool FbxObject::ConnectSrcProperty(const FbxProperty& pProperty) {
-    return pProperty.IsValid() &&
-           detail::ObjectData::connect(pProperty.GetFbxObject()->mData->materialise(pProperty.index()).plug,
-                                       mData->plug);
+    FbxProperty source = pProperty;
+    return source.ConnectDstObject(this);
 }
 
 bool FbxObject::ConnectDstProperty(const FbxProperty& pProperty) {
-    return pProperty.IsValid() &&
-           detail::ObjectData::connect(mData->plug,
-                                       pProperty.GetFbxObject()->mData->materialise(pProperty.index()).plug);
+    FbxProperty destination = pProperty;
+    return destination.ConnectSrcObject(this);
 }
 
 int FbxObject::GetSrcObjectCount() const { return detail::countObjects(mData->plug.sources, FbxCriteria()); }

@@ -189,6 +189,11 @@ bool storeNumbers(const double* numbers, std::size_t count, void* target, EFbxTy
     }
 }
 
+/// A property of single precision keeps no more of a number than that.
+double keptReal(double number, EFbxType type) {
+    return type == eFbxFloat || type == eFbxHalfFloat ? double{static_cast<float>(number)} : number;
+}
+
 bool writeText(PropertyValue& value, const void* source) {
     const auto& text = *static_cast<const FbxString*>(source);
     value.text.assign(text.Buffer(), text.GetLen());
@@ -205,7 +210,7 @@ bool writeWhole(PropertyValue& value, EFbxType to, Wide number) {
         return true;
     case Family::real:
     case Family::vector:
-        value.numbers[0] = static_cast<double>(number);
+        value.numbers[0] = keptReal(static_cast<double>(number), to);
         return true;
     default:
         return false;
@@ -218,7 +223,7 @@ bool writeNumbers(PropertyValue& value, EFbxType to, const double* numbers, std:
         value.integer = keptBits(numbers[0], to);
         return true;
     case Family::real:
-        value.numbers[0] = to == eFbxFloat || to == eFbxHalfFloat ? double{static_cast<float>(numbers[0])} : numbers[0];
+        value.numbers[0] = keptReal(numbers[0], to);
         return true;
     case Family::vector:
         std::copy_n(numbers, std::min(count, componentCount(to)), value.numbers.data());

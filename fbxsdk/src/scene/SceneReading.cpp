@@ -128,6 +128,39 @@ private:
     FbxScene& mScene;
 };
 
+/// Files name the channels of a vector in any order and leave some out; the platform counts on all of them in order.
+void arrangeChannels(const ObjectTable& objects) {
+    for (FbxObject* object : objects) {
+        auto* node = FbxCast<FbxAnimCurveNode>(object);
+        const FbxProperty property = node ? node->GetDstProperty() : FbxProperty();
+        const FbxDouble4 values = property.Get<FbxDouble4>();
+        switch (property.GetPropertyDataType().GetType()) {
+        case eFbxDouble2:
+            node->arrangeChannels({values[0], values[1]});
+            break;
+        case eFbxDouble3:
+            node->arrangeChannels({values[0], values[1], values[2]});
+            break;
+        case eFbxDouble4:
+            node->arrangeChannels({values[0], values[1], values[2], values[3]});
+            break;
+        default:
+            break;
+        }
+    }
+}
+
+/// The stack that the file calls active becomes the current one; without one the scene's first stays current.
+void readCurrentStack(const Document& document, const ObjectTable& objects, FbxScene& scene) {
+    for (FbxObject* object : objects) {
+        auto* stack = FbxCast<FbxAnimStack>(object);
+        if (stack && document.activeStackName == stack->GetName()) {
+            scene.SetCurrentAnimationStack(stack);
+            return;
+        }
+    }
+}
+
 /// Camera nodes that hang nowhere and bear a producer camera's name belong to the settings.
 void readProducerCameras(FbxScene& scene) {
     for (FbxNode* node : sourcesOf<FbxNode>(scene)) {
@@ -150,6 +183,8 @@ bool readScene(const std::shared_ptr<const Document>& document, FbxScene& scene,
     ConnectionReader reader(*document, objects, scene);
     for (const DocumentConnection& connection : document->connections)
         reader.read(connection);
+    arrangeChannels(objects);
+    readCurrentStack(*document, objects, scene);
     readProducerCameras(scene);
     return true;
 }

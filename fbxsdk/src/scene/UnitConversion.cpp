@@ -3,6 +3,7 @@
 //
 // Converting a scene from one unit to another: the nodes below the root are scaled, so that every global matrix is the
 // old one times the factor, and what is measured in scene units but not moved by a node follows.
+#include <initializer_list>
 #include <vector>
 
 #include <fbxsdk/FbxAnimLayer.h>
@@ -31,7 +32,8 @@ bool carriesFactor(const FbxAnimLayer* layer) {
         return true;
     const FbxAnimStack* stack = layer->GetDstObject<FbxAnimStack>();
     const bool base = stack && stack->GetMember<FbxAnimLayer>(0) == layer;
-    const bool additive = layer->BlendMode.Get() == FbxAnimLayer::eBlendAdditive;
+    const bool additive =
+        layer->BlendMode.Get() == FbxAnimLayer::eBlendAdditive && !layer->GetBlendModeBypass(eFbxDouble3);
     return base || !additive || layer->ScaleAccumulationMode.Get() != FbxAnimLayer::eScaleMultiply;
 }
 
@@ -55,36 +57,35 @@ bool ignoresParentScale(const FbxNode& node) {
     return inherit == FbxTransform::eInheritRrs;
 }
 
-/// A node that leaves its parent's scaling out would lose the factor with it, so it is scaled itself; its position,
-/// which lies in the parent's space, has the factor already, and the offset keeps its scaling pivot from moving it.
+/// A node that leaves its parent's scaling out would lose the factor with it, so it is scaled itself. Its position, which
+/// lies in the parent's space, has the factor already: the pivot shrinks by as much as the scaling grows, so that S Sp
+/// stays at every time, and the offset makes up for the pivot.
 void scaleIndependent(FbxNode& node, double k) {
     constexpr auto kSet = FbxNode::eSourcePivot;
     FbxVector4 offset = node.GetScalingOffset(kSet);
     const FbxVector4 pivot = node.GetScalingPivot(kSet);
-    const FbxDouble3 scaling = node.LclScaling.Get();
     for (int i = 0; i < 3; ++i)
-        offset[i] += (k - 1.0) * scaling[i] * pivot[i];
+        offset[i] += pivot[i] - pivot[i] / k;
     node.SetScalingOffset(kSet, offset);
+    node.SetScalingPivot(kSet, multiplied(pivot, 1.0 / k));
     scaleAnimated(node.LclScaling, k, carriesFactor);
 }
 
-void scaleNodes(FbxNode& root, double k, bool convertIndependent) {
+/// Where a converted parent has children that leave its scaling out, they are converted, and theirs likewise.
+std::vector<FbxNode*> independentBelow(FbxNode& root) {
     std::vector<FbxNode*> converted;
-    for (int i = 0; i < root.GetChildCount(); ++i) {
-        scaleFirstLevel(*root.GetChild(i), k);
+    for (int i = 0; i < root.GetChildCount(); ++i)
         converted.push_back(root.GetChild(i));
-    }
-    while (convertIndependent && !converted.empty()) {
-        FbxNode* parent = converted.back();
-        converted.pop_back();
-        for (int i = 0; i < parent->GetChildCount(); ++i) {
-            FbxNode* child = parent->GetChild(i);
-            if (!ignoresParentScale(*child))
-                continue;
-            scaleIndependent(*child, k);
-            converted.push_back(child);
+    const std::size_t firstLevel = converted.size();
+    for (std::size_t parent = 0; parent < converted.size(); ++parent) {
+        for (int i = 0; i < converted[parent]->GetChildCount(); ++i) {
+            FbxNode* child = converted[parent]->GetChild(i);
+            if (ignoresParentScale(*child))
+                converted.push_back(child);
         }
     }
+    converted.erase(converted.begin(), converted.begin() + static_cast<std::ptrdiff_t>(firstLevel));
+    return converted;
 }
 
 void scaleCameraPlanes(FbxScene& scene, double k) {
@@ -95,15 +96,13 @@ void scaleCameraPlanes(FbxScene& scene, double k) {
     }
 }
 
-void scaleLimits(FbxNode& root, double k) {
-    for (int i = 0; i < root.GetChildCount(); ++i) {
-        for (const char* limit : {"TranslationMin", "TranslationMax", "ScalingMin", "ScalingMax"}) {
-            FbxProperty property = root.GetChild(i)->FindProperty(limit);
-            FbxDouble3 value = property.Get<FbxDouble3>();
-            for (int component = 0; component < 3; ++component)
-                value[component] *= k;
-            property.Set(value);
-        }
+void scaleLimits(FbxNode& node, double k, std::initializer_list<const char*> limits) {
+    for (const char* limit : limits) {
+        FbxProperty property = node.FindProperty(limit);
+        FbxDouble3 value = property.Get<FbxDouble3>();
+        for (int component = 0; component < 3; ++component)
+            value[component] *= k;
+        property.Set(value);
     }
 }
 
@@ -114,9 +113,18 @@ void FbxSystemUnit::ConvertChildren(FbxNode* pRoot, const FbxSystemUnit& pSrcUni
     const double k = pSrcUnit.GetConversionFactorTo(*this);
     if (!pRoot || !(k > 0.0) || k == 1.0)
         return;
-    scaleNodes(*pRoot, k, pOptions.mConvertRrsNodes);
-    if (pOptions.mConvertLimits)
-        scaleLimits(*pRoot, k);
+    for (int i = 0; i < pRoot->GetChildCount(); ++i) {
+        scaleFirstLevel(*pRoot->GetChild(i), k);
+        if (pOptions.mConvertLimits)
+            scaleLimits(*pRoot->GetChild(i), k, {"TranslationMin", "TranslationMax", "ScalingMin", "ScalingMax"});
+    }
+    if (!pOptions.mConvertRrsNodes)
+        return;
+    for (FbxNode* node : independentBelow(*pRoot)) {
+        scaleIndependent(*node, k);
+        if (pOptions.mConvertLimits)
+            scaleLimits(*node, k, {"ScalingMin", "ScalingMax"});
+    }
 }
 
 void FbxSystemUnit::ConvertScene(FbxScene* pScene, FbxNode* pFbxRoot, const ConversionOptions& pOptions) const {

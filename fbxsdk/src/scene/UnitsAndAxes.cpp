@@ -21,7 +21,8 @@ constinit const FbxSystemUnit FbxSystemUnit::Yard(91.44);
 constinit const FbxSystemUnit::ConversionOptions FbxSystemUnit::DefaultConversionOptions;
 
 double FbxSystemUnit::GetConversionFactorTo(const FbxSystemUnit& pTarget) const {
-    return mScaleFactor * mMultiplier / (pTarget.mScaleFactor * pTarget.mMultiplier);
+    // kept: the multiplier is carried along and enters no conversion.
+    return mScaleFactor / pTarget.mScaleFactor;
 }
 
 double FbxSystemUnit::GetConversionFactorFrom(const FbxSystemUnit& pSource) const {

@@ -161,8 +161,8 @@ TEST(AsciiSink, SpellsPackedKeyDataAsWholeNumbersFrom7200On) {
     const std::vector<std::uint32_t> words{218434821, 0x80000000};
     const auto emit = [&](RecordSink& sink) { sink.floatBits(words); };
 
-    EXPECT_EQ(valuesOf(emit, 7200), "*2 {\na: 218434821,-2147483648\n} ");
-    EXPECT_EQ(valuesOf(emit, 7100), "*2 {\na: 4.099946e-31,-0\n} ");
+    EXPECT_EQ(valuesOf(emit, 7200), "*2 {\n\ta: 218434821,-2147483648\n} ");
+    EXPECT_EQ(valuesOf(emit, 7100), "*2 {\n\ta: 4.099946e-31,-0\n} ");
 }
 
 TEST(AsciiSink, EscapesQuotesAndLineBreaksAndNothingElse) {

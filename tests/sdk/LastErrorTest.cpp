@@ -1,0 +1,48 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The reason of the last failure: set, cleared and kept per thread.
+#include "TnFbxError.h"
+
+#include "FbxSdk.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <thread>
+
+namespace Tarnell::Fbx {
+namespace {
+
+TEST(LastError, IsSetByAFailureAndClearedByASuccess) {
+    FbxSdk sdk;
+    EXPECT_FALSE(sdk.destroyFbxSdkManager());
+    EXPECT_FALSE(lastError().empty());
+
+    EXPECT_TRUE(sdk.initFbxSdkManager());
+    EXPECT_EQ(lastError(), "");
+}
+
+TEST(LastError, SurvivesTheEndOfTheContext) {
+    {
+        FbxSdk sdk;
+        EXPECT_TRUE(sdk.initFbxSdkManager());
+        EXPECT_FALSE(sdk.loadScene("no such file", true));
+        EXPECT_TRUE(sdk.destroyFbxSdkManager());
+    }
+    EXPECT_NE(lastError().find("no such file"), std::string::npos);
+}
+
+TEST(LastError, BelongsToItsThread) {
+    FbxSdk sdk;
+    EXPECT_FALSE(sdk.destroyFbxSdkManager());
+    std::string seen = "nothing yet";
+
+    std::thread([&seen] { seen = lastError(); }).join();
+
+    EXPECT_EQ(seen, "");
+    EXPECT_FALSE(lastError().empty());
+}
+
+} // namespace
+} // namespace Tarnell::Fbx
