@@ -173,8 +173,8 @@ void printStacks(FbxScene& scene, std::ostream& out) {
         const FbxTimeSpan span = stack.GetLocalTimeSpan();
         out << (i == 0 ? "  Stacks        " : "                ") << '"' << stack.GetName() << "\"  frames "
             << span.GetStart().GetFrameCount(mode) << " to " << span.GetStop().GetFrameCount(mode) << "  ("
-            << number(span.GetStart().GetSecondDouble()) << " to "
-            << number(span.GetStop().GetSecondDouble()) << " s" << ")  layers:";
+            << number(span.GetStart().GetSecondDouble()) << " to " << number(span.GetStop().GetSecondDouble()) << " s"
+            << ")  layers:";
         for (int layer = 0; layer < stack.GetMemberCount<FbxAnimLayer>(); ++layer) {
             out << (layer == 0 ? " " : ", ") << stack.GetMember<FbxAnimLayer>(layer)->GetName();
         }

@@ -2,8 +2,10 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // tarnell-fbx: options and commands.
+#include <algorithm>
 #include <cstdio>
 #include <iostream>
+#include <sstream>
 
 #include <CLI/CLI.hpp>
 
@@ -28,12 +30,26 @@ std::string parseFrames(const std::string& text, std::optional<std::pair<int, in
     return {};
 }
 
+std::vector<std::string> parseKinds(const std::string& text) {
+    const std::vector<std::string>& known = tool::dumpKinds();
+    std::vector<std::string> kinds;
+    std::istringstream list(text);
+    for (std::string kind; std::getline(list, kind, ',');) {
+        if (std::find(known.begin(), known.end(), kind) == known.end()) {
+            throw CLI::ValidationError("--kind", "no such kind: " + kind);
+        }
+        kinds.push_back(kind);
+    }
+    return kinds;
+}
+
 void addDump(CLI::App& app, tool::DumpOptions& options) {
     CLI::App* dump = app.add_subcommand("dump", "Print what the library reads as one JSON document");
     dump->add_option("FILE", options.file, "The FBX file")->required();
-    dump->add_option("--kind", options.kinds, "Comma list of kinds (default: all six)")
-        ->delimiter(',')
-        ->check(CLI::IsMember(tool::dumpKinds()));
+    dump->add_option_function<std::string>(
+            "--kind", [&options](const std::string& text) { options.kinds = parseKinds(text); },
+            "Comma list of cameras, lights, markers, nulls, transforms, meshes (default: all six)")
+        ->type_name("LIST");
     dump->add_flag("--local", options.local, "Local transforms instead of global ones");
     dump->add_option("--frame", options.frame, "Frame at which static values and meshes are read");
     dump->add_option_function<std::string>(
@@ -46,11 +62,14 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
             "A:B, meshes are read at every whole frame of the range")
         ->type_name("A:B");
     dump->add_option("--sample-fps", options.sampleFps, "Sample at this many frames per second");
-    dump->add_flag("!--no-transform-points", options.transformPoints, "Leave mesh points in the node's space");
+    dump->add_flag_callback(
+        "--no-transform-points", [&options] { options.transformPoints = false; },
+        "Leave mesh points in the node's space");
     dump->add_flag("--compute-camera-rotation", options.computeCameraRotation,
                    "Compute the rotation of cameras without target from their interest");
     dump->add_option("--name", options.name, "Only the object of that name");
-    dump->add_flag("!--no-samples", options.samples, "Leave the sample arrays out");
+    dump->add_flag_callback(
+        "--no-samples", [&options] { options.samples = false; }, "Leave the sample arrays out");
     dump->add_flag("--pretty", options.pretty, "Indented");
 }
 

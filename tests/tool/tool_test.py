@@ -1,0 +1,147 @@
+# SPDX-License-Identifier: MIT
+# Copyright (c) Tarnell FBX contributors
+#
+# The command-line tool as a user meets it: what it prints, where, and with which exit status.
+#   tool_test.py TOOL PROJECT_ROOT
+import json
+import os
+import subprocess
+import sys
+import tempfile
+import unittest
+
+TOOL, ROOT = sys.argv[1], sys.argv[2]
+SHOT = os.path.join(ROOT, "examples", "data", "shot_010.fbx")
+
+CAMERA_CHANNELS = [
+    "lookAtPositionX", "lookAtPositionY", "lookAtPositionZ", "upPositionX", "upPositionY", "upPositionZ", "roll",
+    "focalLength", "apertureWidth", "apertureHeight", "nearPlane", "farPlane", "filedOfView", "filedOfViewX",
+    "filedOfViewY", "filmOffsetX", "filmOffsetY"]
+TRANSFORM_CHANNELS = [kind + axis for kind in ("position", "rotation", "scale", "skew", "pivot") for axis in "XYZ"]
+
+
+def run(*arguments):
+    return subprocess.run([TOOL, *arguments], capture_output=True, text=True, timeout=120)
+
+
+def dump(*arguments):
+    result = run("dump", *arguments)
+    assert result.returncode == 0, result.stderr
+    return json.loads(result.stdout)
+
+
+def named(objects, name):
+    return next(each for each in objects if each["name"] == name)
+
+
+class Dump(unittest.TestCase):
+    def test_prints_all_six_kinds_in_order(self):
+        page = dump(SHOT)
+        self.assertEqual(list(page), ["file", "stacks", "range", "cameras", "lights", "markers", "nulls", "transforms",
+                                      "meshes"])
+        self.assertEqual(page["file"], "shot_010.fbx")
+        self.assertEqual(page["stacks"], ["Scene"])
+        self.assertAlmostEqual(page["range"]["start"], 1001 / 24, places=4)
+        self.assertAlmostEqual(page["range"]["end"], 1048 / 24, places=4)
+
+    def test_a_kind_that_was_not_asked_for_has_no_key(self):
+        page = dump("--kind", "nulls,lights", SHOT)
+        self.assertEqual(list(page), ["file", "stacks", "range", "lights", "nulls"])
+
+    def test_a_camera_has_all_its_channels_by_name(self):
+        camera = named(dump("--kind", "cameras", SHOT)["cameras"], "shotCam")
+        self.assertEqual(list(camera), ["name", "rotationOrder", "transform", "projection", "apertureMode", "channels"])
+        self.assertEqual(list(camera["channels"]), CAMERA_CHANNELS)
+        self.assertEqual(list(camera["transform"]), TRANSFORM_CHANNELS)
+        lens = camera["channels"]["focalLength"]
+        self.assertEqual((lens["start"], lens["end"], lens["rate"]), (1001, 1048, 24))
+        self.assertEqual(len(lens["samples"]), 48)
+        self.assertAlmostEqual(lens["samples"][0], 35, places=4)
+        self.assertAlmostEqual(lens["samples"][-1], 50, places=4)
+        self.assertAlmostEqual(camera["channels"]["apertureWidth"], 24.576 / 25.4, places=5)
+
+    def test_producer_cameras_come_first(self):
+        names = [camera["name"] for camera in dump("--kind", "cameras", SHOT)["cameras"]]
+        self.assertEqual(names, ["Producer Perspective", "Producer Top", "Producer Bottom", "Producer Front",
+                                 "Producer Back", "Producer Right", "Producer Left", "shotCam"])
+
+    def test_samples_can_be_left_out(self):
+        lens = named(dump("--no-samples", "--kind", "cameras", SHOT)["cameras"], "shotCam")["channels"]["focalLength"]
+        self.assertEqual(list(lens), ["value", "start", "end", "rate"])
+
+    def test_a_name_picks_one_object(self):
+        page = dump("--name", "targetTip", "--kind", "nulls,cameras", SHOT)
+        self.assertEqual([each["name"] for each in page["nulls"]], ["targetTip"])
+        self.assertEqual(page["cameras"], [])
+
+    def test_meshes_have_one_entry_per_frame(self):
+        meshes = dump("--kind", "meshes", "--frames", "1001:1003", SHOT)["meshes"]
+        self.assertEqual([(mesh["name"], mesh["frame"]) for mesh in meshes],
+                         [("crate", 1001), ("crate", 1002), ("crate", 1003)])
+
+    def test_a_mesh_in_the_world_stands_where_the_application_put_it(self):
+        mesh = dump("--kind", "meshes", SHOT)["meshes"][0]
+        self.assertEqual(mesh["polygonVertexSizes"], [4] * 6)
+        self.assertEqual(len(mesh["pointIndices"]), 24)
+        self.assertEqual(len(mesh["normals"]), 72)
+        self.assertEqual(len(mesh["uvs"]), 48)
+        self.assertEqual(len(mesh["colours"]), 96)
+        heights = mesh["controlPoints"][1::3]
+        self.assertAlmostEqual(min(heights), 0, places=3)
+        self.assertAlmostEqual(max(heights), 100, places=3)
+
+    def test_points_can_stay_in_the_space_of_the_node(self):
+        mesh = dump("--kind", "meshes", "--no-transform-points", SHOT)["meshes"][0]
+        self.assertAlmostEqual(max(mesh["controlPoints"]), 0.5, places=5)
+
+    def test_resampling_changes_frames_and_rate(self):
+        camera = named(dump("--kind", "cameras", "--sample-fps", "48", SHOT)["cameras"], "shotCam")
+        self.assertEqual(camera["channels"]["focalLength"]["start"], 2002)
+
+    def test_pretty_and_plain_say_the_same(self):
+        self.assertEqual(dump("--pretty", SHOT), dump(SHOT))
+
+    def test_a_file_that_cannot_be_read_gives_one_line_and_status_1(self):
+        with tempfile.TemporaryDirectory() as folder:
+            broken = os.path.join(folder, "broken.fbx")
+            with open(SHOT, "rb") as source, open(broken, "wb") as target:
+                target.write(source.read()[:5000])
+            empty = os.path.join(folder, "empty.fbx")
+            open(empty, "wb").close()
+            text = os.path.join(folder, "words.fbx")
+            with open(text, "w") as target:
+                target.write("hello\n")
+            for file in (os.path.join(folder, "missing.fbx"), folder, broken, empty, text):
+                result = run("dump", file)
+                self.assertEqual(result.returncode, 1, file)
+                self.assertEqual(result.stdout, "")
+                self.assertEqual(len(result.stderr.splitlines()), 1)
+                self.assertTrue(result.stderr.startswith(f"tarnell-fbx: {file}: "), result.stderr)
+
+    def test_wrong_usage_gives_status_2(self):
+        for arguments in ((), ("dump",), ("dump", "--kind", "teapots", SHOT), ("dump", "--frames", "3:1", SHOT),
+                          ("dump", "--frames", "x", SHOT), ("dump", "--no-such-option", SHOT), ("info",), ("bake",)):
+            result = run(*arguments)
+            self.assertEqual(result.returncode, 2, arguments)
+            self.assertEqual(result.stdout, "")
+
+    def test_help_is_no_error(self):
+        self.assertEqual(run("--help").returncode, 0)
+        self.assertIn("--frames", run("dump", "--help").stdout)
+
+
+class Info(unittest.TestCase):
+    def test_shows_what_a_person_asks_first(self):
+        page = run("info", SHOT).stdout
+        for fact in ("7.4, binary", "Blender", "centimetre", "+Y up", "24 frames per second",
+                     '"Scene"  frames 1001 to 1048', "1 × camera", "shotCam  [camera]", "targetTip  [null]"):
+            self.assertIn(fact, page)
+
+    def test_takes_several_files_and_goes_on_after_a_bad_one(self):
+        result = run("info", SHOT, "missing.fbx", SHOT)
+        self.assertEqual(result.returncode, 1)
+        self.assertEqual(result.stdout.count("24 frames per second"), 2)
+        self.assertIn("missing.fbx", result.stderr)
+
+
+unittest.main(argv=sys.argv[:1], verbosity=0)
