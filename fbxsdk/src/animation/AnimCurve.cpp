@@ -135,6 +135,18 @@ float FbxAnimCurve::Evaluate(FbxTime pTime, int* pLast) {
     return value;
 }
 
+namespace {
+
+/// The time at a part, 0 to 1, of the way from one to a later one; they may be further apart than ticks can count.
+std::int64_t ticksBetween(std::int64_t from, std::int64_t to, double part) {
+    const std::uint64_t length = static_cast<std::uint64_t>(to) - static_cast<std::uint64_t>(from);
+    const double steps = std::min(std::round(part * static_cast<double>(length)), 18446744073709549568.0);
+    const std::uint64_t taken = std::min(static_cast<std::uint64_t>(steps), length);
+    return static_cast<std::int64_t>(static_cast<std::uint64_t>(from) + taken);
+}
+
+} // namespace
+
 float FbxAnimCurve::EvaluateIndex(double pIndex) {
     const std::size_t count = mKeys->keyCount();
     if (count == 0)
@@ -144,9 +156,8 @@ float FbxAnimCurve::EvaluateIndex(double pIndex) {
     if (pIndex >= static_cast<double>(count - 1))
         return mKeys->values[count - 1];
     const auto key = static_cast<std::size_t>(pIndex);
-    const double part = pIndex - static_cast<double>(key);
-    const double length = static_cast<double>(mKeys->times[key + 1]) - static_cast<double>(mKeys->times[key]);
-    return detail::evaluate(*mKeys, mKeys->times[key] + std::llround(part * length));
+    return detail::evaluate(*mKeys, ticksBetween(mKeys->times[key], mKeys->times[key + 1],
+                                                 pIndex - static_cast<double>(key)));
 }
 
 void FbxAnimCurve::SetPreExtrapolation(EExtrapolationType pExtrapolation) {

@@ -131,21 +131,28 @@ bool FbxCache::OpenFileForRead(FbxStatus* pStatus) {
     const FbxScene* scene = GetScene();
     const std::string fbxFile = scene ? scene->sceneData().fileName() : std::string();
     const EFileFormat format = GetCacheFileFormat();
-    outcome.fail(FbxStatus::eInvalidParameter, "the cache names no file");
-    for (const std::string& place : detail::cacheFileCandidates(fbxFile, relative.Buffer(), absolute.Buffer())) {
+    if (format != eMayaCache && format != eMaxPointCacheV2)
+        return outcome.fail(FbxStatus::eInvalidParameter, "the cache is of no format that can be read");
+    const auto places = detail::cacheFileCandidates(fbxFile, relative.Buffer(), absolute.Buffer());
+    if (places.empty())
+        return outcome.fail(FbxStatus::eInvalidParameter, "the cache names no file");
+    for (const std::string& place : places) {
         auto file = std::make_unique<detail::CacheFile>();
         FbxStatus status;
-        if (format == eMayaCache)
+        if (format == eMayaCache) {
             file->mayaReader = detail::MayaCacheReader::open(place, status);
-        if (format == eMaxPointCacheV2)
+        } else {
             file->pointReader = detail::PointCacheReader::open(place, status);
+        }
         if (file->mayaReader || file->pointReader) {
             mFile = std::move(file);
             outcome.status.Clear();
             return true;
         }
-        // The first place that holds a damaged file says more than the last that holds none.
-        if (!outcome.status.Error() || status.GetCode() == FbxStatus::eInvalidFile)
+        // A place that holds a damaged file says more than one that holds none, and the first more than the last.
+        const bool isDamage = status.GetCode() == FbxStatus::eInvalidFile;
+        const bool knowsDamage = outcome.status.GetCode() == FbxStatus::eInvalidFile;
+        if (!outcome.status.Error() || (isDamage && !knowsDamage))
             outcome.status = status;
     }
     return false;

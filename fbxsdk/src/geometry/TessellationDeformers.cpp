@@ -167,7 +167,7 @@ void carryAll(FbxMesh& mesh, const FbxGeometry& from, const PointCarrier& carrie
     }
 }
 
-/// Destroys an object that feeds nothing any more.
+/// What a deformer consists of; links are none of it.
 void destroyParts(FbxDeformer& deformer) {
     if (auto* skin = FbxCast<FbxSkin>(&deformer)) {
         while (FbxCluster* cluster = skin->GetCluster(0))

@@ -42,24 +42,14 @@ bool isFinite(const Vector& point) {
     return std::isfinite(point[0]) && std::isfinite(point[1]) && std::isfinite(point[2]);
 }
 
-Vector unit(const Vector& vector) {
-    // Scaled first, so that neither tiny nor huge vectors lose their length.
-    const double largest = std::max({std::abs(vector[0]), std::abs(vector[1]), std::abs(vector[2])});
-    if (!(largest > 0.0) || !std::isfinite(largest))
-        return {0, 0, 0, 0};
-    Vector result = xyz(vector) / largest;
-    result.Normalize();
-    return result;
-}
-
 /// The direction of a derivative. Where it vanishes, as at the pole of a sphere, that of the nearby ones: they grow
 /// with the mixed derivative on the way inwards, which leads up at the start of the other direction and down at its
 /// end.
 Vector directionOf(const Vector& derivative, const Vector& mixed, double scale, double place) {
     constexpr double kVanishing = 1e-9;
     if (xyz(derivative).Length() > kVanishing * scale)
-        return unit(derivative);
-    return unit(place > 0.5 ? -mixed : mixed);
+        return unitVector(derivative);
+    return unitVector(place > 0.5 ? -mixed : mixed);
 }
 
 Vector normalOf(const SurfaceSample& sample, double placeU, double placeV) {
@@ -68,7 +58,7 @@ Vector normalOf(const SurfaceSample& sample, double placeU, double placeV) {
     const Vector alongV = directionOf(sample.byV, sample.byUV, scale, placeU);
     const Vector normal = xyz(alongU.CrossProduct(alongV));
     constexpr double kParallel = 1e-12;
-    return normal.Length() > kParallel ? unit(normal) : Vector(0, 0, 0, 0);
+    return normal.Length() > kParallel ? unitVector(normal) : Vector(0, 0, 0, 0);
 }
 
 /// The control points of the u direction, blended along v for one row of samples.
@@ -189,6 +179,16 @@ std::optional<SampledSurface> sampleGeometry(const FbxGeometry& geometry, std::i
 }
 
 } // namespace
+
+FbxVector4 unitVector(const FbxVector4& vector) {
+    // Scaled first, so that neither tiny nor huge vectors lose their length.
+    const double largest = std::max({std::abs(vector[0]), std::abs(vector[1]), std::abs(vector[2])});
+    if (!(largest > 0.0) || !std::isfinite(largest))
+        return {0, 0, 0, 0};
+    FbxVector4 result = FbxVector4(vector[0], vector[1], vector[2], 0.0) / largest;
+    result.Normalize();
+    return result;
+}
 
 std::int64_t sampleBudget(std::int64_t controlPoints, std::int64_t sharesPerSample, std::int64_t numbersPerPoint) {
     constexpr std::int64_t kSamplesPerPoint = 64; // eight steps both ways

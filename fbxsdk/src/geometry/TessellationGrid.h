@@ -26,6 +26,9 @@ inline constexpr std::int64_t kMostSamples = std::int64_t{1} << 22;
 [[nodiscard]] std::int64_t sampleBudget(std::int64_t controlPoints, std::int64_t sharesPerSample,
                                         std::int64_t numbersPerPoint);
 
+/// The vector at length 1; zero for a vector without length, or without a finite one.
+[[nodiscard]] FbxVector4 unitVector(const FbxVector4& vector);
+
 /// u runs fastest, in control points and in samples.
 class TessellationGrid {
 public:

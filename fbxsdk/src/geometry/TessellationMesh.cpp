@@ -40,14 +40,13 @@ void fillPolygons(FbxMesh& mesh, const TessellationGrid& grid) {
         starts[polygon] = 3 * polygon;
 }
 
-/// What the surface has no direction for, as at the tip of a cusp, takes the direction of the triangle.
+/// What the surface has no direction for, as at the tip of a cusp, takes the direction of the triangle; zero when the
+/// triangle has none either.
 FbxVector4 triangleNormal(const FbxMesh& mesh, int corner) {
     const int* vertices = mesh.GetPolygonVertices() + corner / 3 * 3;
     const FbxVector4* points = mesh.GetControlPoints();
     const FbxVector4 first = points[vertices[0]];
-    FbxVector4 normal = (points[vertices[1]] - first).CrossProduct(points[vertices[2]] - first);
-    normal.Normalize();
-    return normal;
+    return unitVector(unitVector(points[vertices[1]] - first).CrossProduct(unitVector(points[vertices[2]] - first)));
 }
 
 void addNormals(FbxMesh& mesh, FbxLayer& layer, const TessellationGrid& grid) {

@@ -20,7 +20,7 @@
 #include <fbxsdk/FbxTrimNurbsSurface.h>
 #include <fbxsdk/FbxVertexCacheDeformer.h>
 
-#include "../scene/SceneFixture.h"
+#include "GeometryFixture.h"
 #include "NurbsSamples.h"
 
 namespace fbxsdk {
@@ -28,7 +28,7 @@ namespace {
 
 using detail::expectNear;
 
-class GeometryConverter : public SceneFixture {
+class GeometryConverter : public GeometryFixture {
 protected:
     GeometryConverter() : converter(manager), node(make<FbxNode>("node")) { scene->GetRootNode()->AddChild(node); }
 
@@ -190,6 +190,54 @@ TEST_F(GeometryConverter, TakesTheDirectionOfTheTriangleWhereTheSurfaceHasNone) 
     FbxVector4 normal;
     ASSERT_TRUE(mesh->GetPolygonVertexNormal(0, 0, normal));
     expectNear(normal, FbxVector4(0, 0, 1));
+}
+
+TEST_F(GeometryConverter, GivesHugeSurfacesNormalsToo) {
+    FbxPatch* patch = bilinear(2);
+    for (int i = 0; i < 4; ++i)
+        patch->SetControlPointAt(patch->GetControlPointAt(i) * 1e200, i);
+    FbxMesh* mesh = converted(patch);
+    ASSERT_NE(mesh, nullptr);
+    for (int polygon = 0; polygon < mesh->GetPolygonCount(); ++polygon) {
+        FbxVector4 normal;
+        ASSERT_TRUE(mesh->GetPolygonVertexNormal(polygon, 0, normal));
+        EXPECT_NEAR(normal.Length(), 1.0, 1e-12);
+    }
+}
+
+TEST_F(GeometryConverter, GivesASurfaceShrunkToAPointNormalsOfZero) {
+    auto* patch = make<FbxPatch>();
+    patch->InitControlPoints(2, FbxPatch::eLinear, 2, FbxPatch::eLinear);
+    FbxMesh* mesh = converted(patch);
+    ASSERT_NE(mesh, nullptr);
+    FbxVector4 normal;
+    ASSERT_TRUE(mesh->GetPolygonVertexNormal(0, 0, normal));
+    EXPECT_EQ(normal, FbxVector4(0, 0, 0, 1));
+}
+
+TEST_F(GeometryConverter, ConvertsASurfaceThatStillStandsInItsFile) {
+    auto* surface = read<FbxNurbsSurface>(R"(
+        NurbsSurfaceOrder: 2,2
+        Dimensions: 2,2
+        Step: 1,2
+        Form: "Open","Open"
+        Points: *16 { a: 0,0,0,1, 2,0,0,1, 0,4,0,1, 2,4,0,1 }
+        KnotVectorU: *4 { a: 0,0,1,1 }
+        KnotVectorV: *4 { a: 0,0,1,1 }
+        LayerElementMaterial: 0 {
+            MappingInformationType: "AllSame"
+            ReferenceInformationType: "IndexToDirect"
+            Materials: *1 { a: 2 }
+        }
+        Layer: 0 { LayerElement: { Type: "LayerElementMaterial" TypedIndex: 0 } }
+        FlipNormals: 1)");
+    node->SetNodeAttribute(surface);
+    FbxMesh* mesh = converted(surface);
+    ASSERT_NE(mesh, nullptr);
+    EXPECT_EQ(cornersOf(*mesh), (std::vector<int>{0, 3, 1, 0, 2, 3, 2, 5, 3, 2, 4, 5}));
+    expectNear(mesh->GetControlPointAt(3), FbxVector4(2, 2, 0));
+    ASSERT_NE(mesh->GetLayer(0)->GetMaterials(), nullptr);
+    EXPECT_EQ(mesh->GetLayer(0)->GetMaterials()->GetIndexArray().GetFirst(), 2);
 }
 
 TEST_F(GeometryConverter, ReplacesTheAttributeOnEveryNode) {

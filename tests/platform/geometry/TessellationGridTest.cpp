@@ -63,7 +63,7 @@ TEST_F(TessellationGridOf, ASphereIsRoundWithOutwardNormalsAtThePolesToo) {
     expectNear(normalAt(*grid, 3, grid->v().sampleCount() - 1), FbxVector4(0, 0, 1), 1e-9);
 }
 
-TEST_F(TessellationGridOf, AClampedCircleSharesThePointsOfItsSeam) {
+TEST_F(TessellationGridOf, AClampedCircleKeepsBothEndsOfItsSeam) {
     auto* surface = make<FbxNurbsSurface>();
     makeCylinder(*surface);
     surface->SetStep(2, 1);
@@ -85,6 +85,7 @@ TEST_F(TessellationGridOf, APeriodicDirectionSharesThePointsOfItsSeam) {
     for (int i = 0; i < 12; ++i)
         surface->SetControlPointAt(
             FbxVector4(std::cos(1.0471975511965976 * i), std::sin(1.0471975511965976 * i), i / 6), i);
+    surface->SetStep(4, 1);
     const auto grid = gridOf(*surface);
     ASSERT_TRUE(grid);
     EXPECT_EQ(grid->u().sampleCount(), 25);
