@@ -88,10 +88,12 @@ void readNode(FbxNode& node, FbxAnimLayer* layer) {
     for (int i = 0; i < node.GetNodeAttributeCount(); ++i) {
         FbxNodeAttribute* attribute = node.GetNodeAttributeByIndex(i);
         bool known = false;
-        for (int n = 0; n < attribute->GetNodeCount(); ++n) known = known || attribute->GetNode(n) == &node;
+        for (int n = 0; n < attribute->GetNodeCount(); ++n)
+            known = known || attribute->GetNode(n) == &node;
         require(known, "an attribute that does not know its node");
         readCurves(*attribute, layer);
-        if (auto* mesh = FbxCast<FbxMesh>(attribute)) readMesh(*mesh);
+        if (auto* mesh = FbxCast<FbxMesh>(attribute))
+            readMesh(*mesh);
     }
     readCurves(node, layer);
     for (const FbxLongLong ticks : {FbxLongLong{0}, FbxLongLong{46186158000}, FbxLongLong{1} << 60}) {
@@ -112,8 +114,10 @@ void readScene(FbxScene& scene) {
         FbxNode* node = pending.back();
         pending.pop_back();
         require(++read <= scene.GetNodeCount(), "the tree has more nodes than the scene");
-        if (read <= kNodesRead) readNode(*node, layer);
-        for (int i = 0; i < node->GetChildCount(); ++i) pending.push_back(node->GetChild(i));
+        if (read <= kNodesRead)
+            readNode(*node, layer);
+        for (int i = 0; i < node->GetChildCount(); ++i)
+            pending.push_back(node->GetChild(i));
     }
 }
 
@@ -128,7 +132,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t siz
     const std::span<const char> input(reinterpret_cast<const char*>(bytes), size);
     auto tree = detail::readRecords(input, "input.fbx", status);
     std::shared_ptr<const detail::Document> document;
-    if (tree) document = detail::readDocument(std::move(tree), status);
+    if (tree)
+        document = detail::readDocument(std::move(tree), status);
     if (!document) {
         require(status.Error() && status.GetErrorString()[0] != '\0', "a failure without a reason");
         return 0;

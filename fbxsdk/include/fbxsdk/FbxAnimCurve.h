@@ -134,7 +134,8 @@ public:
     unsigned long GetPostExtrapolationCount() const override;
     bool GetTimeInterval(FbxTimeSpan& pTimeInterval) const override;
 
-    /// Sets everything of one key. An index out of range changes nothing.
+    /// Sets everything of one key. An index out of range changes nothing. A constant key has no tangents and holds its
+    /// own value; KeySetConstantMode makes it hold the next one's.
     virtual void KeySet(int pKeyIndex, FbxTime pTime, float pValue,
                         FbxAnimCurveDef::EInterpolationType pInterpolation = FbxAnimCurveDef::eInterpolationCubic,
                         FbxAnimCurveDef::ETangentMode pTangentMode = FbxAnimCurveDef::eTangentAuto, float pData0 = 0.0F,

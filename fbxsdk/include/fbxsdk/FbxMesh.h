@@ -71,6 +71,9 @@ public:
     /// The platform's own view: the polygons as they are, without asking the file.
     [[nodiscard]] detail::PlainArray<int>& polygonVertices() { return mPolygonVertices; }
     [[nodiscard]] detail::PlainArray<int>& polygonStarts() { return mPolygonStarts; }
+    /// What elements mapped by edge count: for each edge the place in the polygon vertex array where it starts. Empty
+    /// unless a file had them, and from the first change of polygons on. Read from the file when first asked for.
+    [[nodiscard]] detail::PlainArray<int>& edges();
 
 protected:
     bool readSource(const detail::GeometrySource& pSource) override;
@@ -80,6 +83,7 @@ private:
         const int next = pPolygonIndex + 1;
         return next < mPolygonStarts.count() ? mPolygonStarts[next] : mPolygonVertices.count();
     }
+    void dropEdges();
     /// The corner's place in the polygon vertex array; -1 out of range.
     [[nodiscard]] int cornerOf(int pPolygonIndex, int pPositionInPolygon) const {
         const bool inRange = pPositionInPolygon >= 0 && pPositionInPolygon < GetPolygonSize(pPolygonIndex);
@@ -88,6 +92,8 @@ private:
 
     detail::PlainArray<int> mPolygonVertices;
     detail::PlainArray<int> mPolygonStarts;
+    detail::PlainArray<int> mEdges;
+    std::unique_ptr<detail::ElementSource> mEdgeSource;
     bool mPolygonOpen = false;
 };
 

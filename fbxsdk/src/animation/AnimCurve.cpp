@@ -62,7 +62,12 @@ void moveKey(detail::CurveKeys& keys, std::size_t index, std::int64_t ticks) {
 
 constexpr std::uint32_t kInterpolationBits =
     detail::KeyFlag::constant | detail::KeyFlag::linear | detail::KeyFlag::cubic;
-constexpr std::uint32_t kTangentBits = 0x7F00;
+/// The tangent mode of a key; of a constant key its constant mode.
+constexpr std::uint32_t kModeBits = 0x7F00;
+
+bool isConstant(const detail::KeyAttributes& attributes) {
+    return (attributes.flags & kInterpolationBits) == detail::KeyFlag::constant;
+}
 
 } // namespace
 
@@ -156,8 +161,8 @@ float FbxAnimCurve::EvaluateIndex(double pIndex) {
     if (pIndex >= static_cast<double>(count - 1))
         return mKeys->values[count - 1];
     const auto key = static_cast<std::size_t>(pIndex);
-    return detail::evaluate(*mKeys, ticksBetween(mKeys->times[key], mKeys->times[key + 1],
-                                                 pIndex - static_cast<double>(key)));
+    return detail::evaluate(*mKeys,
+                            ticksBetween(mKeys->times[key], mKeys->times[key + 1], pIndex - static_cast<double>(key)));
 }
 
 void FbxAnimCurve::SetPreExtrapolation(EExtrapolationType pExtrapolation) {
@@ -205,7 +210,10 @@ void FbxAnimCurve::KeySet(int pKeyIndex, FbxTime pTime, float pValue,
     detail::CurveKeys& keys = editKeys();
     const auto index = static_cast<std::size_t>(pKeyIndex);
     detail::KeyAttributes attributes;
-    attributes.flags = static_cast<std::uint32_t>(pInterpolation) | static_cast<std::uint32_t>(pTangentMode) |
+    // A constant key has no tangents; their bits would read as its constant mode.
+    const bool constant = pInterpolation == FbxAnimCurveDef::eInterpolationConstant;
+    attributes.flags = static_cast<std::uint32_t>(pInterpolation) |
+                       (constant ? 0U : static_cast<std::uint32_t>(pTangentMode)) |
                        static_cast<std::uint32_t>(pTangentWeightMode);
     attributes.data = {pData0, pData1, pWeight0, pWeight1, pVelocity0, pVelocity1};
     keys.values[index] = pValue;
@@ -232,17 +240,21 @@ void FbxAnimCurve::KeySetInterpolation(int pKeyIndex, FbxAnimCurveDef::EInterpol
     if (!hasKey(*mKeys, pKeyIndex))
         return;
     detail::KeyAttributes attributes = attributesOf(*mKeys, pKeyIndex);
+    const bool becomesConstant = pInterpolation == FbxAnimCurveDef::eInterpolationConstant;
+    if (isConstant(attributes) != becomesConstant)
+        attributes.flags = (attributes.flags & ~kModeBits) | (becomesConstant ? 0U : detail::KeyFlag::tangentAuto);
     attributes.flags = (attributes.flags & ~kInterpolationBits) | static_cast<std::uint32_t>(pInterpolation);
     editKeys().setAttributes(static_cast<std::size_t>(pKeyIndex), attributes);
 }
 
 FbxAnimCurveDef::EConstantMode FbxAnimCurve::KeyGetConstantMode(int pKeyIndex) const {
-    const bool next = (attributesOf(*mKeys, pKeyIndex).flags & detail::KeyFlag::constantNext) != 0;
+    const detail::KeyAttributes& attributes = attributesOf(*mKeys, pKeyIndex);
+    const bool next = isConstant(attributes) && (attributes.flags & detail::KeyFlag::constantNext) != 0;
     return next ? FbxAnimCurveDef::eConstantNext : FbxAnimCurveDef::eConstantStandard;
 }
 
 void FbxAnimCurve::KeySetConstantMode(int pKeyIndex, FbxAnimCurveDef::EConstantMode pMode) {
-    if (!hasKey(*mKeys, pKeyIndex))
+    if (!hasKey(*mKeys, pKeyIndex) || !isConstant(attributesOf(*mKeys, pKeyIndex)))
         return;
     detail::KeyAttributes attributes = attributesOf(*mKeys, pKeyIndex);
     attributes.flags = (attributes.flags & ~detail::KeyFlag::constantNext) | static_cast<std::uint32_t>(pMode);
@@ -250,14 +262,16 @@ void FbxAnimCurve::KeySetConstantMode(int pKeyIndex, FbxAnimCurveDef::EConstantM
 }
 
 FbxAnimCurveDef::ETangentMode FbxAnimCurve::KeyGetTangentMode(int pKeyIndex) const {
-    return static_cast<FbxAnimCurveDef::ETangentMode>(attributesOf(*mKeys, pKeyIndex).flags & kTangentBits);
+    const detail::KeyAttributes& attributes = attributesOf(*mKeys, pKeyIndex);
+    return isConstant(attributes) ? FbxAnimCurveDef::eTangentAuto
+                                  : static_cast<FbxAnimCurveDef::ETangentMode>(attributes.flags & kModeBits);
 }
 
 void FbxAnimCurve::KeySetTangentMode(int pKeyIndex, FbxAnimCurveDef::ETangentMode pTangent) {
-    if (!hasKey(*mKeys, pKeyIndex))
+    if (!hasKey(*mKeys, pKeyIndex) || isConstant(attributesOf(*mKeys, pKeyIndex)))
         return;
     detail::KeyAttributes attributes = attributesOf(*mKeys, pKeyIndex);
-    attributes.flags = (attributes.flags & ~kTangentBits) | static_cast<std::uint32_t>(pTangent);
+    attributes.flags = (attributes.flags & ~kModeBits) | static_cast<std::uint32_t>(pTangent);
     editKeys().setAttributes(static_cast<std::size_t>(pKeyIndex), attributes);
 }
 

@@ -8,10 +8,12 @@
 #include <fbxsdk/FbxAnimCurveNode.h>
 #include <fbxsdk/FbxAnimLayer.h>
 #include <fbxsdk/FbxAnimStack.h>
+#include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
 
 #include "animation/PropertyEvaluation.h"
 #include "scene/PropertyConversion.h"
+#include "scene/SceneMembers.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace {
@@ -36,6 +38,15 @@ int channelOf(const FbxAnimCurveNode& node, const char* channel) {
             return node.GetChannelIndex(alias[1]);
     }
     return -1;
+}
+
+/// The order in which layers compose the object's rotations; what is no node has none of its own.
+FbxEuler::EOrder orderInForce(FbxObject& object) {
+    FbxEuler::EOrder order = FbxEuler::eOrderXYZ;
+    const auto* node = FbxCast<FbxNode>(&object);
+    if (node && node->GetRotationActive() && !node->GetRotationSpaceForLimitOnly(FbxNode::eSourcePivot))
+        node->GetRotationOrder(FbxNode::eSourcePivot, order);
+    return order;
 }
 
 } // namespace
@@ -72,10 +83,9 @@ FbxAnimCurveNode* FbxProperty::GetCurveNode(FbxAnimStack* pAnimStack, bool pCrea
 FbxAnimCurveNode* FbxProperty::GetCurveNode(FbxAnimLayer* pAnimLayer, bool pCreate) {
     if (!IsValid() || !pAnimLayer)
         return nullptr;
-    const FbxCriteria curveNodes = FbxCriteria::ObjectType(FbxAnimCurveNode::ClassId);
-    for (int i = 0; FbxObject* source = GetSrcObject(curveNodes, i); ++i) {
-        if (source->IsConnectedDstObject(pAnimLayer))
-            return static_cast<FbxAnimCurveNode*>(source);
+    for (FbxAnimCurveNode* node : detail::sourcesOf<FbxAnimCurveNode>(*this)) {
+        if (node->IsConnectedDstObject(pAnimLayer))
+            return node;
     }
     return pCreate ? pAnimLayer->CreateCurveNode(*this) : nullptr;
 }
@@ -96,7 +106,7 @@ void FbxProperty::evaluate(void* pValue, EFbxType pType, const FbxTime& pTime) {
     detail::AnimatedProperty animation = detail::bindAnimation(*this, scene->GetCurrentAnimationStack());
     if (!animation.animated())
         return;
-    const detail::Components value = detail::evaluateAnimation(animation, pTime, FbxEuler::eOrderXYZ);
+    const detail::Components value = detail::evaluateAnimation(animation, pTime, orderInForce(*mObject));
     detail::convertNumbers(value, pValue, pType);
 }
 

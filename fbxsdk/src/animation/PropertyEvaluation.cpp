@@ -15,6 +15,7 @@
 #include <fbxsdk/FbxAnimStack.h>
 
 #include "core/Rotation.h"
+#include "scene/SceneMembers.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -26,25 +27,6 @@ LayerRule ruleOf(std::string_view propertyName) {
     if (propertyName == "Lcl Scaling")
         return LayerRule::scaling;
     return LayerRule::sum;
-}
-
-FbxAnimCurveNode* curveNodeOn(const FbxProperty& property, const FbxAnimLayer& layer) {
-    const FbxCriteria curveNodes = FbxCriteria::ObjectType(FbxAnimCurveNode::ClassId);
-    for (int i = 0;; ++i) {
-        FbxObject* source = property.GetSrcObject(curveNodes, i);
-        if (!source)
-            return nullptr;
-        if (source->IsConnectedDstObject(&layer))
-            return static_cast<FbxAnimCurveNode*>(source);
-    }
-}
-
-bool anySolo(const FbxAnimStack& stack, int layerCount) {
-    for (int i = 0; i < layerCount; ++i) {
-        if (stack.GetMember<FbxAnimLayer>(i)->Solo.Get())
-            return true;
-    }
-    return false;
 }
 
 /// What the layer says for each component: its curve's value, or the channel's where it has none.
@@ -151,15 +133,16 @@ AnimatedProperty bindAnimation(const FbxProperty& property, FbxAnimStack* stack)
     if (!stack || property.GetSrcObjectCount() == 0)
         return animation;
 
-    const int layerCount = stack->GetMemberCount<FbxAnimLayer>();
-    const bool soloOnly = anySolo(*stack, layerCount);
-    for (int i = 0; i < layerCount; ++i) {
-        FbxAnimLayer* layer = stack->GetMember<FbxAnimLayer>(i);
+    const std::vector<FbxAnimLayer*> layers = sourcesOf<FbxAnimLayer>(*stack);
+    const std::vector<FbxAnimCurveNode*> curveNodes = sourcesOf<FbxAnimCurveNode>(property);
+    const bool soloOnly = std::any_of(layers.begin(), layers.end(), [](auto* layer) { return layer->Solo.Get(); });
+    for (FbxAnimLayer* layer : layers) {
         if (layer->Mute.Get() || (soloOnly && !layer->Solo.Get()))
             continue;
-        const FbxAnimCurveNode* curveNode = curveNodeOn(property, *layer);
-        if (curveNode)
-            animation.contributions.push_back({layer, curveNode, i == 0});
+        const auto node = std::find_if(curveNodes.begin(), curveNodes.end(),
+                                       [&](auto* each) { return each->IsConnectedDstObject(layer); });
+        if (node != curveNodes.end())
+            animation.contributions.push_back({layer, *node, layer == layers.front()});
     }
     return animation;
 }

@@ -13,31 +13,30 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
+/// How many polygons a list of corners is cut into.
+int countPolygons(const PlainArray<int>& corners) {
+    const auto closed = std::count_if(corners.begin(), corners.end(), [](int corner) { return corner < 0; });
+    const bool lastIsOpen = corners.count() > 0 && corners[corners.count() - 1] >= 0;
+    return static_cast<int>(closed) + (lastIsOpen ? 1 : 0);
+}
+
 /// Corners come as in files: a negative entry is the last corner of its polygon, all bits inverted. A last polygon that
 /// is never closed ends with the list. Corners at points that do not exist go to point 0; when there are no points,
 /// there can be no polygons.
 void cutIntoPolygons(PlainArray<int>& corners, PlainArray<int>& starts, int pointCount) {
-    if (pointCount == 0) {
+    if (pointCount == 0)
         corners.clear();
-        return;
+    starts.resizeUninitialised(countPolygons(corners));
+    int* start = starts.begin();
+    bool atStart = true;
+    for (int i = 0; i < corners.count(); ++i) {
+        const int stored = corners[i];
+        const int corner = stored < 0 ? ~stored : stored;
+        corners[i] = corner < pointCount ? corner : 0;
+        if (atStart)
+            *start++ = i;
+        atStart = stored < 0;
     }
-    starts.reserve(static_cast<int>(std::count_if(corners.begin(), corners.end(), [](int i) { return i < 0; })) + 1);
-    const int count = corners.count();
-    int start = 0;
-    for (int i = 0; i < count; ++i) {
-        int& corner = corners[i];
-        const bool last = corner < 0;
-        if (last)
-            corner = ~corner;
-        if (corner >= pointCount)
-            corner = 0;
-        if (last) {
-            starts.add(start);
-            start = i + 1;
-        }
-    }
-    if (start < count)
-        starts.add(start);
 }
 
 /// Adds offsets, three numbers each, to the points that the indices name; without indices to the first points in order.

@@ -4,7 +4,9 @@
 // Polygons, and what layer 0 holds for their corners.
 #include <fbxsdk/FbxMesh.h>
 
-#include "geometry/GeometrySource.h"
+#include "geometry/GeometryReading.h"
+#include "geometry/ItemReading.h"
+#include "geometry/LayerReading.h"
 #include "scene/ManagerData.h"
 #include "scene/Schema.h"
 
@@ -44,8 +46,29 @@ FbxMesh::~FbxMesh() = default;
 
 FbxNodeAttribute::EType FbxMesh::GetAttributeType() const { return eMesh; }
 
+bool FbxMesh::readSource(const detail::GeometrySource& pSource) {
+    detail::readMesh(*this, *pSource.body);
+    detail::readLayers(*this, pSource);
+    if (const detail::Record* edges = pSource.body->child("Edges"))
+        mEdgeSource.reset(new detail::ElementSource{pSource.document, nullptr, edges});
+    return true;
+}
+
+detail::PlainArray<int>& FbxMesh::edges() {
+    ensureLoaded();
+    if (const std::unique_ptr<detail::ElementSource> source = std::move(mEdgeSource))
+        detail::readItems(*source->index, mEdges);
+    return mEdges;
+}
+
+void FbxMesh::dropEdges() {
+    mEdgeSource.reset();
+    mEdges.clear();
+}
+
 void FbxMesh::BeginPolygon(int pMaterial, int pTexture, int pGroup, bool /*pLegacy*/) {
     detachSource();
+    dropEdges();
     mPolygonStarts.add(mPolygonVertices.count());
     mPolygonOpen = true;
     FbxLayer* layer = GetLayer(0);
@@ -103,6 +126,7 @@ int FbxMesh::RemovePolygon(int pPolygonIndex) {
         return -1;
     const int first = mPolygonStarts[pPolygonIndex];
     const int size = GetPolygonSize(pPolygonIndex);
+    dropEdges();
     mPolygonVertices.remove(first, size);
     mPolygonStarts.remove(pPolygonIndex);
     for (int i = pPolygonIndex; i < mPolygonStarts.count(); ++i)

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How each class of geometry reads itself from its file: its own records, and the layers.
+// How the classes of geometry read themselves from their file: their own records, and the layers.
 #include <fbxsdk/FbxLine.h>
 #include <fbxsdk/FbxNurbs.h>
 #include <fbxsdk/FbxPatch.h>
@@ -27,7 +27,6 @@ bool read(Class& geometry, void (*readRecords)(Class& geometry, const detail::Re
 
 } // namespace
 
-bool FbxMesh::readSource(const detail::GeometrySource& pSource) { return read(*this, detail::readMesh, pSource); }
 bool FbxNurbs::readSource(const detail::GeometrySource& pSource) { return read(*this, detail::readNurbs, pSource); }
 bool FbxNurbsSurface::readSource(const detail::GeometrySource& pSource) {
     return read(*this, detail::readNurbsSurface, pSource);

@@ -4,46 +4,38 @@
 // A property's value and its animation change together, or samples and static values disagree.
 #include "scene/AnimatedValues.h"
 
-#include <vector>
-
 #include <fbxsdk/FbxAnimCurve.h>
 #include <fbxsdk/FbxAnimCurveNode.h>
 #include <fbxsdk/FbxAnimLayer.h>
 #include <fbxsdk/FbxScene.h>
 
 #include "animation/CurveEvaluation.h"
+#include "scene/SceneMembers.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-std::vector<FbxAnimCurveNode*> curveNodesOf(const FbxProperty& property) {
-    std::vector<FbxAnimCurveNode*> nodes;
-    const FbxCriteria curveNodes = FbxCriteria::ObjectType(FbxAnimCurveNode::ClassId);
-    for (int i = 0; FbxObject* source = property.GetSrcObject(curveNodes, i); ++i) {
-        nodes.push_back(static_cast<FbxAnimCurveNode*>(source));
-    }
-    return nodes;
-}
-
-/// In how many channels the curve stands, over all curve nodes.
-int useCount(const FbxAnimCurve& curve) {
-    int count = 0;
-    const FbxCriteria curveNodes = FbxCriteria::ObjectType(FbxAnimCurveNode::ClassId);
-    for (int i = 0; FbxObject* destination = curve.GetDstObject(curveNodes, i); ++i) {
-        const auto& node = static_cast<const FbxAnimCurveNode&>(*destination);
-        for (unsigned int channel = 0; channel < node.GetChannelsCount(); ++channel) {
-            for (unsigned int id = 0; node.GetCurve(channel, id); ++id)
-                count += node.GetCurve(channel, id) == &curve;
+/// Whether the curve stands in more than one channel, over all curve nodes. Thousands may share one curve: the answer
+/// is known after the first two.
+bool isShared(const FbxAnimCurve& curve) {
+    int uses = 0;
+    for (const ConnectionPoint* point : curve.data().plug.destinations) {
+        const auto* node = point->property < 0 ? FbxCast<FbxAnimCurveNode>(point->object) : nullptr;
+        for (unsigned int channel = 0; node && channel < node->GetChannelsCount(); ++channel) {
+            for (unsigned int id = 0; node->GetCurve(channel, id); ++id)
+                uses += node->GetCurve(channel, id) == &curve;
         }
+        if (uses > 1)
+            return true;
     }
-    return count;
+    return false;
 }
 
 /// The channel's curve, replaced by a copy of its own when it drives anything else.
 FbxAnimCurve* ownCurve(FbxAnimCurveNode& node, unsigned int channel) {
     FbxAnimCurve* curve = node.GetCurve(channel);
-    if (!curve || useCount(*curve) <= 1)
+    if (!curve || !isShared(*curve))
         return curve;
     FbxScene* scene = curve->GetScene();
     FbxAnimCurve* copy = scene ? FbxAnimCurve::Create(scene, curve->GetName())
@@ -107,7 +99,7 @@ void scaleAnimated(FbxProperty property, double factor, const std::function<bool
     if (!property.IsValid())
         return;
     scaleValue(property, factor);
-    for (FbxAnimCurveNode* node : curveNodesOf(property)) {
+    for (FbxAnimCurveNode* node : sourcesOf<FbxAnimCurveNode>(property)) {
         if (!applies(node->GetDstObject<FbxAnimLayer>()))
             continue;
         for (unsigned int channel = 0; channel < node->GetChannelsCount(); ++channel) {
@@ -130,7 +122,7 @@ void permuteAnimated(FbxProperty property, const SignedPermutation& permutation)
         value[i] = old[permutation.source[row]] * permutation.sign[row];
     }
     property.Set(value);
-    for (FbxAnimCurveNode* node : curveNodesOf(property))
+    for (FbxAnimCurveNode* node : sourcesOf<FbxAnimCurveNode>(property))
         permuteChannels(*node, permutation);
 }
 

@@ -4,6 +4,8 @@
 // The table of formats. Readers and writers are the same two.
 #include <fbxsdk/FbxIOPluginRegistry.h>
 
+#include <algorithm>
+#include <array>
 #include <cstring>
 #include <iterator>
 
@@ -12,6 +14,7 @@
 #include "container/AsciiPreamble.h"
 #include "container/BinaryReader.h"
 #include "container/MappedFile.h"
+#include "document/VersionTraits.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace {
@@ -22,8 +25,14 @@ struct Format {
 };
 constexpr int kBinary = 0, kAscii = 1;
 constexpr Format kFormats[] = {{"FBX binary (*.fbx)", "fbx"}, {"FBX ascii (*.fbx)", "fbx"}};
-constexpr const char* kVersions[] = {"FBX201000", "FBX201100", "FBX201200", "FBX201300",
-                                     "FBX201400", "FBX201600", nullptr};
+
+/// What can be written, ended by null.
+constexpr auto kVersions = [] {
+    std::array<const char*, std::size(detail::kVersionTraits) + 1> names{};
+    std::transform(std::begin(detail::kVersionTraits), std::end(detail::kVersionTraits), names.begin(),
+                   [](const detail::VersionTraits& version) { return version.name; });
+    return names;
+}();
 
 const Format* formatAt(int index) {
     return index >= 0 && index < static_cast<int>(std::size(kFormats)) ? &kFormats[index] : nullptr;
@@ -83,7 +92,7 @@ int FbxIOPluginRegistry::FindWriterIDByExtension(const char* pExtension) const {
 }
 
 char const* const* FbxIOPluginRegistry::GetWritableVersions(int pFileFormat) const {
-    return formatAt(pFileFormat) ? kVersions : nullptr;
+    return formatAt(pFileFormat) ? kVersions.data() : nullptr;
 }
 
 FBXSDK_NAMESPACE_END

@@ -28,6 +28,7 @@
 #include "scene/PropertyReading.h"
 #include "scene/Schema.h"
 #include "scene/ShadingLetters.h"
+#include "scene/SubClassNames.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -75,28 +76,14 @@ void readCamera(const Reading& reading) {
 }
 
 void readSkeleton(const Reading& reading) {
-    constexpr struct {
-        std::string_view subClass;
-        FbxSkeleton::EType type;
-    } kTypes[] = {{"Root", FbxSkeleton::eRoot},
-                  {"Limb", FbxSkeleton::eLimb},
-                  {"LimbNode", FbxSkeleton::eLimbNode},
-                  {"Effector", FbxSkeleton::eEffector}};
-    for (const auto& row : kTypes) {
+    for (const auto& row : kSkeletonSubClasses) {
         if (row.subClass == reading.source.subClass)
             reading.as<FbxSkeleton>().SetSkeletonType(row.type);
     }
 }
 
 void readMarker(const Reading& reading) {
-    constexpr struct {
-        std::string_view subClass;
-        FbxMarker::EType type;
-    } kTypes[] = {{"Marker", FbxMarker::eStandard},
-                  {"OpticalMarker", FbxMarker::eOptical},
-                  {"FKEffector", FbxMarker::eEffectorFK},
-                  {"IKEffector", FbxMarker::eEffectorIK}};
-    for (const auto& row : kTypes) {
+    for (const auto& row : kMarkerSubClasses) {
         if (row.subClass == reading.source.subClass)
             reading.as<FbxMarker>().SetType(row.type);
     }

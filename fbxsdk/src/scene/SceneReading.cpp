@@ -9,7 +9,6 @@
 
 #include <fbxsdk/FbxAnimCurve.h>
 #include <fbxsdk/FbxAnimCurveNode.h>
-#include <fbxsdk/FbxAnimStack.h>
 #include <fbxsdk/FbxCamera.h>
 #include <fbxsdk/FbxGlobalCameraSettings.h>
 #include <fbxsdk/FbxGlobalLightSettings.h>
@@ -150,17 +149,6 @@ void arrangeChannels(const ObjectTable& objects) {
     }
 }
 
-/// The stack that the file calls active becomes the current one; without one the scene's first stays current.
-void readCurrentStack(const Document& document, const ObjectTable& objects, FbxScene& scene) {
-    for (FbxObject* object : objects) {
-        auto* stack = FbxCast<FbxAnimStack>(object);
-        if (stack && document.activeStackName == stack->GetName()) {
-            scene.SetCurrentAnimationStack(stack);
-            return;
-        }
-    }
-}
-
 /// Camera nodes that hang nowhere and bear a producer camera's name belong to the settings.
 void readProducerCameras(FbxScene& scene) {
     for (FbxNode* node : sourcesOf<FbxNode>(scene)) {
@@ -184,7 +172,6 @@ bool readScene(const std::shared_ptr<const Document>& document, FbxScene& scene,
     for (const DocumentConnection& connection : document->connections)
         reader.read(connection);
     arrangeChannels(objects);
-    readCurrentStack(*document, objects, scene);
     readProducerCameras(scene);
     return true;
 }

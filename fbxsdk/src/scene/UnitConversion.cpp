@@ -3,6 +3,7 @@
 //
 // Converting a scene from one unit to another: the nodes below the root are scaled, so that every global matrix is the
 // old one times the factor, and what is measured in scene units but not moved by a node follows.
+#include <cmath>
 #include <initializer_list>
 #include <vector>
 
@@ -21,6 +22,9 @@ FBXSDK_NAMESPACE_BEGIN
 namespace {
 
 using detail::scaleAnimated;
+
+/// A unit that is none gives no factor that a scene could be multiplied by.
+bool isFactor(double k) { return k > 0.0 && std::isfinite(k); }
 
 FbxVector4 multiplied(const FbxVector4& vector, double factor) {
     return {vector[0] * factor, vector[1] * factor, vector[2] * factor, 1.0};
@@ -57,9 +61,9 @@ bool ignoresParentScale(const FbxNode& node) {
     return inherit == FbxTransform::eInheritRrs;
 }
 
-/// A node that leaves its parent's scaling out would lose the factor with it, so it is scaled itself. Its position, which
-/// lies in the parent's space, has the factor already: the pivot shrinks by as much as the scaling grows, so that S Sp
-/// stays at every time, and the offset makes up for the pivot.
+/// A node that leaves its parent's scaling out would lose the factor with it, so it is scaled itself. Its position,
+/// which lies in the parent's space, has the factor already: the pivot shrinks by as much as the scaling grows, so that
+/// S Sp stays at every time, and the offset makes up for the pivot.
 void scaleIndependent(FbxNode& node, double k) {
     constexpr auto kSet = FbxNode::eSourcePivot;
     FbxVector4 offset = node.GetScalingOffset(kSet);
@@ -111,7 +115,7 @@ void scaleLimits(FbxNode& node, double k, std::initializer_list<const char*> lim
 void FbxSystemUnit::ConvertChildren(FbxNode* pRoot, const FbxSystemUnit& pSrcUnit,
                                     const ConversionOptions& pOptions) const {
     const double k = pSrcUnit.GetConversionFactorTo(*this);
-    if (!pRoot || !(k > 0.0) || k == 1.0)
+    if (!pRoot || !isFactor(k) || k == 1.0)
         return;
     for (int i = 0; i < pRoot->GetChildCount(); ++i) {
         scaleFirstLevel(*pRoot->GetChild(i), k);
@@ -133,7 +137,7 @@ void FbxSystemUnit::ConvertScene(FbxScene* pScene, FbxNode* pFbxRoot, const Conv
     FbxGlobalSettings& settings = pScene->GetGlobalSettings();
     const FbxSystemUnit source = settings.GetSystemUnit();
     const double k = source.GetConversionFactorTo(*this);
-    if (!(k > 0.0) || source == *this)
+    if (!isFactor(k) || source == *this)
         return;
     ConvertChildren(pFbxRoot, source, pOptions);
     if (pOptions.mConvertClusters) {

@@ -175,6 +175,25 @@ TEST_F(MeshReading, ComesBeforeChangesByTheHost) {
     EXPECT_EQ(mesh->GetControlPointAt(3), FbxVector4(9, 9, 9));
 }
 
+TEST_F(MeshReading, ReadsEdgesWhenTheyAreAskedFor) {
+    FbxMesh* mesh = read<FbxMesh>(kFourPoints + "PolygonVertexIndex: *3 { a: 0,1,-3 }\nEdges: *3 { a: 0,1,2 }\n");
+
+    EXPECT_THAT(std::vector<int>(mesh->edges().begin(), mesh->edges().end()), ElementsAre(0, 1, 2));
+}
+
+TEST_F(MeshReading, HasNoEdgesAnyMoreWhenPolygonsChange) {
+    const std::string records = kFourPoints + "PolygonVertexIndex: *3 { a: 0,1,-3 }\nEdges: *3 { a: 0,1,2 }\n";
+    FbxMesh* grown = read<FbxMesh>(records);
+    FbxMesh* cut = read<FbxMesh>(records);
+    EXPECT_EQ(cut->edges().count(), 3);
+
+    addPolygon(*grown, {0, 2, 3});
+    cut->RemovePolygon(0);
+
+    EXPECT_EQ(grown->edges().count(), 0);
+    EXPECT_EQ(cut->edges().count(), 0);
+}
+
 TEST_F(MeshReading, KeepsTheFileAsLongAsItIsNeeded) {
     FbxMesh* mesh = make<FbxMesh>();
     std::weak_ptr<const fbxsdk::detail::Document> watched;

@@ -49,8 +49,7 @@ inline FbxAnimCurve* keys(FbxProperty property, FbxAnimLayer* layer, const char*
     }
     for (const Key& key : list) {
         const FbxTime time = seconds(key.first);
-        curve->KeySet(curve->KeyAdd(time), time, static_cast<float>(key.second),
-                      FbxAnimCurveDef::eInterpolationLinear);
+        curve->KeySet(curve->KeyAdd(time), time, static_cast<float>(key.second), FbxAnimCurveDef::eInterpolationLinear);
     }
     return curve;
 }

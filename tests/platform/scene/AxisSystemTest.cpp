@@ -107,9 +107,9 @@ TEST(FbxAxisSystemTest, ReadsWhatKnownToolsWrite) {
 }
 
 TEST(FbxAxisSystemTest, TakesWhatIsNoSystemForTheDefault) {
-    const std::array<int, 6> kWrong[] = {{1, 1, 1, 1, 0, 1},        {1, 1, 2, 1, 2, 1},        {3, 1, 2, 1, 0, 1},
-                                         {-1, 1, 2, 1, 0, 1},       {1, 1, 2, 1, 7, 1},        {0, 0, 0, 0, 0, 0},
-                                         {INT_MAX, 1, 2, 1, 0, 1}, {INT_MIN, 1, INT_MIN, 1, 0, 1}};
+    const std::array<int, 6> kWrong[] = {
+        {1, 1, 1, 1, 0, 1}, {1, 1, 2, 1, 2, 1}, {3, 1, 2, 1, 0, 1},       {-1, 1, 2, 1, 0, 1},
+        {1, 1, 2, 1, 7, 1}, {0, 0, 0, 0, 0, 0}, {INT_MAX, 1, 2, 1, 0, 1}, {INT_MIN, 1, INT_MIN, 1, 0, 1}};
     for (const auto& file : kWrong)
         EXPECT_EQ(systemOf(file), FbxAxisSystem());
     const auto none = static_cast<FbxAxisSystem::EUpVector>(0);

@@ -4,7 +4,6 @@
 // The default camera and the producer cameras.
 #include <fbxsdk/FbxGlobalCameraSettings.h>
 
-#include <iterator>
 #include <string>
 #include <vector>
 
@@ -122,17 +121,20 @@ TEST_F(FbxGlobalCameraSettingsTest, MakeTheSwitcherWithANode) {
 }
 
 TEST_F(FbxGlobalCameraSettingsTest, MakeThemOnceOnly) {
+    const auto cameras = [this] {
+        std::vector<const FbxCamera*> found;
+        for (const Expected& row : kExpected)
+            found.push_back((settings().*row.camera)());
+        return found;
+    };
     settings().CreateProducerCameras();
-    std::vector<FbxCamera*> first;
-    for (const Expected& row : kExpected)
-        first.push_back((settings().*row.camera)());
-    FbxCameraSwitcher* switcher = settings().GetCameraSwitcher();
+    const std::vector<const FbxCamera*> first = cameras();
+    const FbxCameraSwitcher* switcher = settings().GetCameraSwitcher();
     const int nodeCount = scene->GetNodeCount();
 
     settings().CreateProducerCameras();
 
-    for (std::size_t i = 0; i < std::size(kExpected); ++i)
-        EXPECT_EQ((settings().*kExpected[i].camera)(), first[i]) << kExpected[i].name;
+    EXPECT_EQ(cameras(), first);
     EXPECT_EQ(settings().GetCameraSwitcher(), switcher);
     EXPECT_EQ(scene->GetNodeCount(), nodeCount);
 }

@@ -10,8 +10,8 @@
 
 #include <fbxsdk/FbxString.h>
 
-#include "support/TemporaryFolder.h"
 #include "SceneFixture.h"
+#include "support/TemporaryFolder.h"
 
 namespace {
 

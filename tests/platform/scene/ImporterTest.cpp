@@ -199,11 +199,11 @@ TEST_F(FbxImporterTest, MakesTheScenesTimeModeTheGlobalOne) {
     EXPECT_EQ(FbxTime::GetFrameRate(FbxTime::eCustom), 12.5);
 }
 
-TEST_F(FbxImporterTest, MakesTheStackCurrentThatTheFileCallsActive) {
+TEST_F(FbxImporterTest, KeepsTheFirstStackCurrentAndTellsWhichOneTheFileCallsActive) {
     ASSERT_TRUE(openedText(kTwoStacks)->Import(scene));
 
     ASSERT_NE(scene->GetCurrentAnimationStack(), nullptr);
-    EXPECT_STREQ(scene->GetCurrentAnimationStack()->GetName(), "Walk");
+    EXPECT_STREQ(scene->GetCurrentAnimationStack()->GetName(), "Idle");
     EXPECT_STREQ(scene->ActiveAnimStackName.Get().Buffer(), "Walk");
 }
 

@@ -32,8 +32,8 @@ constexpr double kTolerance = 1e-9;
 constexpr struct {
     FbxEuler::EOrder order;
     const char* letters;
-} kOrders[] = {{FbxEuler::eOrderXYZ, "XYZ"}, {FbxEuler::eOrderXZY, "XZY"}, {FbxEuler::eOrderYZX, "YZX"},
-               {FbxEuler::eOrderYXZ, "YXZ"}, {FbxEuler::eOrderZXY, "ZXY"}, {FbxEuler::eOrderZYX, "ZYX"},
+} kOrders[] = {{FbxEuler::eOrderXYZ, "XYZ"},       {FbxEuler::eOrderXZY, "XZY"}, {FbxEuler::eOrderYZX, "YZX"},
+               {FbxEuler::eOrderYXZ, "YXZ"},       {FbxEuler::eOrderZXY, "ZXY"}, {FbxEuler::eOrderZYX, "ZYX"},
                {FbxEuler::eOrderSphericXYZ, "XYZ"}};
 
 class NodeEvaluationTest : public SceneFixture {
@@ -46,10 +46,9 @@ protected:
 
     static void expectLocal(FbxNode* node, const plain::Matrix& expected, const char* what = "") {
         const plain::Matrix actual = plain::of(node->EvaluateLocalTransform());
-        EXPECT_LT(plain::difference(actual, expected), kTolerance)
-            << what << "\n"
-            << plain::text(actual) << "instead of\n"
-            << plain::text(expected);
+        EXPECT_LT(plain::difference(actual, expected), kTolerance) << what << "\n"
+                                                                   << plain::text(actual) << "instead of\n"
+                                                                   << plain::text(expected);
     }
     static void expectGlobal(FbxNode* node, const plain::Matrix& expected, FbxTime time = FBXSDK_TIME_INFINITE) {
         const plain::Matrix actual = plain::of(node->EvaluateGlobalTransform(time));
@@ -106,8 +105,7 @@ TEST_F(NodeEvaluationTest, RotatesBeforeAndAfterAlwaysInXyz) {
     node->LclRotation.Set(FbxDouble3(5, 15, 25));
 
     const FbxDouble3 pre(10, 20, 30), post(40, 50, 60), angles(5, 15, 25);
-    expectLocal(node,
-                plain::rotation(pre) * plain::rotation(angles, "ZYX") * plain::transposed(plain::rotation(post)));
+    expectLocal(node, plain::rotation(pre) * plain::rotation(angles, "ZYX") * plain::transposed(plain::rotation(post)));
 }
 
 TEST_F(NodeEvaluationTest, IgnoresOrderAndOuterRotationsWhileRotationIsInactive) {

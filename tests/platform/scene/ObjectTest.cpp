@@ -52,9 +52,7 @@ TEST_F(FbxObjectTest, TakesANullNameForTheEmptyOne) {
     EXPECT_STREQ(object->GetName(), "");
 }
 
-TEST_F(FbxObjectTest, NeedsNoUniqueName) {
-    EXPECT_NE(make<FbxNode>("same"), make<FbxNode>("same"));
-}
+TEST_F(FbxObjectTest, NeedsNoUniqueName) { EXPECT_NE(make<FbxNode>("same"), make<FbxNode>("same")); }
 
 TEST_F(FbxObjectTest, IsNotMadeWithoutManagerOrContainer) {
     EXPECT_EQ(FbxNode::Create(static_cast<FbxManager*>(nullptr), "x"), nullptr);

@@ -14,7 +14,9 @@ public:
     explicit SeededRandom(unsigned seed) : mEngine(seed) {}
 
     /// Between the bounds; the engine is standard, distributions are not.
-    double real(double low, double high) { return low + (high - low) * (static_cast<double>(mEngine()) / 4294967295.0); }
+    double real(double low, double high) {
+        return low + (high - low) * (static_cast<double>(mEngine()) / 4294967295.0);
+    }
     int whole(int count) { return static_cast<int>(mEngine() % static_cast<unsigned>(count)); }
     bool chance(int oneIn) { return whole(oneIn) == 0; }
 

@@ -14,9 +14,9 @@ TEST(FbxSystemUnitTest, CountsCentimetres) {
     const struct {
         const FbxSystemUnit& unit;
         double centimetres;
-    } kUnits[] = {{FbxSystemUnit::mm, 0.1},        {FbxSystemUnit::cm, 1.0},     {FbxSystemUnit::dm, 10.0},
-                  {FbxSystemUnit::m, 100.0},       {FbxSystemUnit::km, 100000.0}, {FbxSystemUnit::Inch, 2.54},
-                  {FbxSystemUnit::Foot, 30.48},    {FbxSystemUnit::Yard, 91.44}, {FbxSystemUnit::Mile, 160934.4}};
+    } kUnits[] = {{FbxSystemUnit::mm, 0.1},     {FbxSystemUnit::cm, 1.0},      {FbxSystemUnit::dm, 10.0},
+                  {FbxSystemUnit::m, 100.0},    {FbxSystemUnit::km, 100000.0}, {FbxSystemUnit::Inch, 2.54},
+                  {FbxSystemUnit::Foot, 30.48}, {FbxSystemUnit::Yard, 91.44},  {FbxSystemUnit::Mile, 160934.4}};
     for (const auto& row : kUnits) {
         EXPECT_EQ(row.unit.GetScaleFactor(), row.centimetres);
         EXPECT_EQ(row.unit.GetMultiplier(), 1.0);

@@ -295,6 +295,19 @@ TEST_F(UnitConversionTest, ConvertsASharedCurveForItsUserAlone) {
     EXPECT_EQ(child->LclRotation.GetCurve(layer, "Z")->KeyGetValue(1), 2.0F);
 }
 
+TEST_F(UnitConversionTest, ConvertsThousandsOfUsersOfOneCurve) {
+    FbxAnimLayer* layer = addStack(*scene);
+    FbxAnimCurve* shared = keys(addNode("first")->LclTranslation, layer, "X", {{0, 1}});
+    for (int i = 0; i < 5'000; ++i)
+        addNode("n")->LclTranslation.GetCurveNode(layer, true)->ConnectToChannel(shared, "X");
+    scene->GetGlobalSettings().SetSystemUnit(FbxSystemUnit::m);
+
+    FbxSystemUnit::cm.ConvertScene(scene);
+
+    for (const int index : {0, 1, 2'500, 5'000})
+        EXPECT_EQ(scene->GetRootNode()->GetChild(index)->EvaluateGlobalTransform(seconds(0)).GetT()[0], 100.0);
+}
+
 TEST_F(UnitConversionTest, ConvertsTangentsWithTheirKeys) {
     FbxAnimLayer* layer = addStack(*scene);
     FbxNode* node = addNode("node");
