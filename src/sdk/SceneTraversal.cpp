@@ -220,9 +220,7 @@ bool walkSubtree(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode* top) {
 /// The samples that a list may take; nodes that are read one by one have no such limit.
 class SampleShare {
 public:
-    explicit SampleShare(std::int64_t& samplesLeft) : mSamplesLeft(samplesLeft) {
-        mSamplesLeft = FbxSdk::kMaxSamplesPerList;
-    }
+    SampleShare(std::int64_t& samplesLeft, std::int64_t share) : mSamplesLeft(samplesLeft) { mSamplesLeft = share; }
     ~SampleShare() { mSamplesLeft = detail::kUnlimitedSamples; }
     SampleShare(const SampleShare&) = delete;
     SampleShare& operator=(const SampleShare&) = delete;
@@ -314,7 +312,7 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     if (!mInitialized || mScene == nullptr) {
         return fail("no scene is loaded");
     }
-    const SampleShare share(mSamplesLeft);
+    const SampleShare share(mSamplesLeft, mSamplesPerList);
     TnFbxTime time;
     getGlobalAnimationStackTime(time, info.getFrame(), info.getUseSampleFPS(), info.getSampleFPS());
     int index = 0;

@@ -8,8 +8,11 @@
 #include "LastError.h"
 #include "NodeWalk.h"
 #include "SampleRange.h"
-
 #include "model/FrameArithmetic.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <system_error>
 
 namespace Tarnell::Fbx {
 
@@ -86,6 +89,15 @@ void triangulate(fbxsdk::FbxManager* manager, fbxsdk::FbxNode& node) {
         fbxsdk::FbxGeometryConverter converter(manager);
         converter.Triangulate(attribute, /*pReplace*/ true, /*pLegacy*/ false);
     }
+}
+
+/// How many samples a list read from the file may hold.
+std::int64_t samplesForFile(const std::string& fileName) {
+    std::error_code error;
+    const std::uintmax_t bytes = std::filesystem::file_size(fileName, error);
+    const auto most = static_cast<std::uintmax_t>(FbxSdk::kMaxSamplesPerList / FbxSdk::kSamplesPerFileByte);
+    const std::int64_t counted = error ? 0 : static_cast<std::int64_t>(std::min(bytes, most));
+    return std::min(FbxSdk::kSamplesOfAnyFile + counted * FbxSdk::kSamplesPerFileByte, FbxSdk::kMaxSamplesPerList);
 }
 
 } // namespace
@@ -183,6 +195,7 @@ bool FbxSdk::loadScene(const std::string& fileName, bool convertGeometry) {
         convertNurbsAndPatchRecursive(mManager, mScene->GetRootNode());
     }
     initCreateAnimationStack();
+    mSamplesPerList = samplesForFile(fileName);
     return succeed();
 }
 

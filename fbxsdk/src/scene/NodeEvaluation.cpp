@@ -35,8 +35,8 @@ struct TransformBinding {
 
 namespace {
 
-/// 64 MiB of cached transforms per manager.
-constexpr std::size_t kMaximumCachedTransforms = (std::size_t{64} << 20U) / sizeof(GlobalTransform);
+/// 16 MiB of cached transforms per manager.
+constexpr std::size_t kMaximumCachedTransforms = (std::size_t{16} << 20U) / sizeof(GlobalTransform);
 
 /// A node's own matrices at one time.
 struct LocalTransform {

@@ -246,6 +246,13 @@ TEST_F(LayerReading, DoesNotBelieveNumbersOfLayersBeyondReason) {
     EXPECT_NE(mesh->GetLayer(0)->GetUVs(), nullptr);
 }
 
+TEST_F(LayerReading, HasAtMostOneLayerForEachLayerAndElementOfTheFile) {
+    const std::string uv = element("LayerElementUV", "ByVertice", "Direct", kUvs);
+
+    EXPECT_EQ(triangle(uv + layer(1, {{"LayerElementUV", 0}}))->GetLayerCount(), 2);
+    EXPECT_EQ(triangle(uv + layer(2, {{"LayerElementUV", 0}}))->GetLayerCount(), 1) << "as if no layer had named it";
+}
+
 TEST_F(LayerReading, IgnoresEntriesForElementsThatAreNotThere) {
     FbxMesh* mesh = triangle(layer(0, {{"LayerElementNormal", 0}, {"LayerElementUV", 7}, {"", 0}}));
 
