@@ -8,6 +8,7 @@
 #include "Fbx.h"
 #include "TnFbxCamera.h"
 #include "TnFbxError.h"
+#include "TnFbxReadInfo.h"
 
 int main(int, char** argv) {
     using namespace Tarnell::Fbx;

@@ -9,6 +9,7 @@
 #include "Fbx.h"
 #include "TnFbxCamera.h"
 #include "TnFbxError.h"
+#include "TnFbxReadInfo.h"
 
 using namespace Tarnell::Fbx;
 

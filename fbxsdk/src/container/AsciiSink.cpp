@@ -1,0 +1,251 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// ASCII files: a record per line, a tab per level, and a block in braces.
+#include "container/AsciiSink.h"
+
+#include <algorithm>
+#include <bit>
+#include <cassert>
+#include <charconv>
+#include <cmath>
+#include <type_traits>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+/// What is handed on at a time.
+constexpr std::size_t kFlushBytes = std::size_t{1} << 16;
+/// Lines of arrays are broken behind the first comma beyond this length …
+constexpr std::size_t kArrayLine = 2000;
+/// … and lists of single values, in the older layout, before the first one beyond this.
+constexpr std::size_t kListLine = 115;
+constexpr std::string_view kListContinuation = "\n             ";
+
+/// From this version on the packed data of keys is spelt as whole numbers, before as floats.
+constexpr std::uint32_t kFirstVersionWithBitPatterns = 7200;
+
+constexpr struct {
+    char character;
+    std::string_view entity;
+} kEntities[] = {{'"', "&quot;"}, {'\n', "&lf;"}, {'\r', "&cr;"}};
+
+void appendBase64(std::string& text, std::span<const char> bytes) {
+    constexpr std::string_view kDigits = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
+    for (std::size_t i = 0; i < bytes.size(); i += 3) {
+        const std::size_t count = std::min<std::size_t>(3, bytes.size() - i);
+        std::uint32_t bits = 0;
+        for (std::size_t j = 0; j < 3; ++j) {
+            bits = bits << 8U | (j < count ? static_cast<unsigned char>(bytes[i + j]) : 0U);
+        }
+        for (std::size_t j = 0; j < 4; ++j) {
+            text += j <= count ? kDigits[bits >> (18U - 6U * j) & 63U] : '=';
+        }
+    }
+}
+
+} // namespace
+
+AsciiSink::AsciiSink(ByteOutput& output, std::uint32_t version) : mOutput(output), mVersion(version) {
+    const std::uint32_t digits[] = {version / 1000, version / 100 % 10, version / 10 % 10};
+    mText = "; FBX ";
+    for (const std::uint32_t digit : digits) {
+        mText += std::to_string(digit) + '.';
+    }
+    mText.back() = ' ';
+    mText += "project file\n; ----------------------------------------------------\n\n";
+    mLineStart = mText.size();
+}
+
+void AsciiSink::indent() { mText.append(mOpen.size(), '\t'); }
+
+void AsciiSink::endLine() {
+    mText += '\n';
+    mLineStart = mText.size();
+    flushWhenLong();
+}
+
+void AsciiSink::flushWhenLong() {
+    if (mText.size() < kFlushBytes) {
+        return;
+    }
+    mOutput.write(mText);
+    mText.clear();
+    mLineStart = 0;
+}
+
+void AsciiSink::beginRecord(std::string_view name) {
+    assert(mOpen.empty() || mOpen.back().hasBlock);
+    indent();
+    mText += name;
+    mText += ": ";
+    mOpen.emplace_back();
+}
+
+void AsciiSink::beginBlock() {
+    assert(!mOpen.empty() && !mOpen.back().hasBlock);
+    mOpen.back().hasBlock = true;
+    mText += " {";
+    endLine();
+}
+
+void AsciiSink::endRecord() {
+    assert(!mOpen.empty());
+    const bool hasBlock = mOpen.back().hasBlock;
+    mOpen.pop_back();
+    if (hasBlock) {
+        indent();
+        mText += '}';
+    }
+    endLine();
+}
+
+void AsciiSink::separate(bool beforeText) {
+    assert(!mOpen.empty() && !mOpen.back().hasBlock);
+    if (mOpen.back().valueCount++ == 0) {
+        return;
+    }
+    if (mVersion < kFirstVersionWithArrays && mText.size() - mLineStart > kListLine) {
+        flushWhenLong();
+        mLineStart = mText.size() + 1;
+        mText += kListContinuation;
+    }
+    mText += ',';
+    if (beforeText) {
+        mText += ' ';
+    }
+}
+
+template <class Number>
+void AsciiSink::append(Number value) {
+    if constexpr (std::is_floating_point_v<Number>) {
+        if (!std::isfinite(value)) {
+            value = 0;
+        }
+    }
+    char digits[32];
+    const auto result = std::to_chars(std::begin(digits), std::end(digits), value);
+    mText.append(digits, result.ptr);
+}
+
+template <class Number>
+void AsciiSink::number(Number value) {
+    separate(/*beforeText*/ false);
+    append(value);
+}
+
+void AsciiSink::byte(std::uint8_t value) { number(int{value}); }
+void AsciiSink::shortInteger(std::int16_t value) { number(value); }
+void AsciiSink::integer(std::int32_t value) { number(value); }
+void AsciiSink::longInteger(std::int64_t value) { number(value); }
+void AsciiSink::singleReal(float value) { number(value); }
+void AsciiSink::real(double value) { number(value); }
+
+void AsciiSink::letter(char value) {
+    separate(/*beforeText*/ false);
+    mText += value;
+}
+
+void AsciiSink::appendEscaped(std::string_view text) {
+    for (const char c : text) {
+        const auto* const row = std::find_if(std::begin(kEntities), std::end(kEntities),
+                                             [c](const auto& each) { return each.character == c; });
+        if (row != std::end(kEntities)) {
+            mText += row->entity;
+        } else {
+            mText += c;
+        }
+    }
+}
+
+void AsciiSink::text(std::string_view value) {
+    separate(/*beforeText*/ true);
+    mText += '"';
+    appendEscaped(value);
+    mText += '"';
+}
+
+void AsciiSink::raw(std::span<const char> bytes) {
+    // Bytes stand on a line of their own, behind a comma that separates nothing.
+    separate(/*beforeText*/ false);
+    mText += ",\n \"";
+    appendBase64(mText, bytes);
+    mText += '"';
+}
+
+void AsciiSink::objectName(std::string_view className, std::string_view name) {
+    separate(/*beforeText*/ true);
+    mText += '"';
+    mText += className;
+    mText += "::";
+    appendEscaped(name);
+    mText += '"';
+}
+
+template <class Number>
+void AsciiSink::arrayOf(std::span<const Number> values) {
+    if (mVersion < kFirstVersionWithArrays) {
+        for (const Number value : values) {
+            number(value);
+        }
+        return;
+    }
+    separate(/*beforeText*/ false);
+    mText += '*' + std::to_string(values.size()) + " {\n";
+    indent();
+    mText += "a: ";
+    mLineStart = mText.size();
+    for (std::size_t i = 0; i < values.size(); ++i) {
+        if (i > 0) {
+            mText += ',';
+            if (mText.size() - mLineStart > kArrayLine) {
+                endLine();
+            }
+        }
+        append(values[i]);
+    }
+    mText += '\n';
+    mText.append(mOpen.size() - 1, '\t');
+    mText += "} ";
+}
+
+void AsciiSink::array(std::span<const double> values) { arrayOf(values); }
+void AsciiSink::array(std::span<const float> values) { arrayOf(values); }
+void AsciiSink::array(std::span<const std::int32_t> values) { arrayOf(values); }
+void AsciiSink::array(std::span<const std::int64_t> values) { arrayOf(values); }
+
+void AsciiSink::array(std::span<const std::uint8_t> values) {
+    arrayOf(std::span<const std::int32_t>(std::vector<std::int32_t>(values.begin(), values.end())));
+}
+
+void AsciiSink::floatBits(std::span<const std::uint32_t> words) {
+    if (mVersion >= kFirstVersionWithBitPatterns) {
+        std::vector<std::int32_t> numbers(words.size());
+        std::transform(words.begin(), words.end(), numbers.begin(),
+                       [](auto word) { return std::bit_cast<std::int32_t>(word); });
+        array(numbers);
+        return;
+    }
+    std::vector<float> numbers(words.size());
+    std::transform(words.begin(), words.end(), numbers.begin(), [](auto word) { return std::bit_cast<float>(word); });
+    array(numbers);
+}
+
+void AsciiSink::heading(std::string_view title) {
+    assert(mOpen.empty());
+    mText += "\n; ";
+    mText += title;
+    mText += "\n;------------------------------------------------------------------\n";
+    endLine();
+}
+
+void AsciiSink::finish() {
+    assert(mOpen.empty());
+    mOutput.write(mText);
+    mText.clear();
+    mLineStart = 0;
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

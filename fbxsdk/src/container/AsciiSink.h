@@ -1,0 +1,79 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Records as ASCII files hold them.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "container/ByteOutput.h"
+#include "container/RecordSink.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// The layout is the usual one down to the blanks: some readers go line by line. Numbers are written in the shortest
+/// form that reads back the same; what is no number at all is written as 0, since hardly a reader takes anything else.
+class AsciiSink final : public RecordSink {
+public:
+    /// Writes the comment that states the version.
+    AsciiSink(ByteOutput& output, std::uint32_t version);
+
+    [[nodiscard]] bool isBinary() const override { return false; }
+    void beginRecord(std::string_view name) override;
+    void beginBlock() override;
+    void endRecord() override;
+
+    void byte(std::uint8_t value) override;
+    void shortInteger(std::int16_t value) override;
+    void integer(std::int32_t value) override;
+    void longInteger(std::int64_t value) override;
+    void singleReal(float value) override;
+    void real(double value) override;
+    void letter(char value) override;
+    void text(std::string_view value) override;
+    /// As Base64.
+    void raw(std::span<const char> bytes) override;
+    void objectName(std::string_view className, std::string_view name) override;
+
+    void array(std::span<const double> values) override;
+    void array(std::span<const float> values) override;
+    void array(std::span<const std::int32_t> values) override;
+    void array(std::span<const std::int64_t> values) override;
+    void array(std::span<const std::uint8_t> values) override;
+    void floatBits(std::span<const std::uint32_t> words) override;
+
+    void heading(std::string_view title) override;
+    [[nodiscard]] bool failed() const override { return mOutput.failed(); }
+
+    /// All records must be ended.
+    void finish();
+
+private:
+    struct OpenRecord {
+        std::size_t valueCount = 0;
+        bool hasBlock = false;
+    };
+
+    void indent();
+    void endLine();
+    void separate(bool beforeText);
+    template <class Number>
+    void number(Number value);
+    template <class Number>
+    void append(Number value);
+    void appendEscaped(std::string_view text);
+    template <class Number>
+    void arrayOf(std::span<const Number> values);
+    void flushWhenLong();
+
+    ByteOutput& mOutput;
+    std::uint32_t mVersion;
+    std::vector<OpenRecord> mOpen;
+    std::string mText;          ///< not handed on yet
+    std::size_t mLineStart = 0; ///< of the line being written, within mText
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,247 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Binary files. The head of a record tells where the record ends, which is known only behind it: a head is written
+// empty first and filled in when its record ends. BinaryReader.cpp draws the layout.
+#include "container/BinarySink.h"
+
+#include <cassert>
+#include <cstring>
+#include <limits>
+
+#include "container/ByteOrder.h"
+#include "container/ZlibStream.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+constexpr std::string_view kMagic("Kaydara FBX Binary  \0\x1A\0", 23);
+constexpr std::uint32_t kFirstWideVersion = 7500;
+/// Raw bytes from which on an array is compressed. The applications draw the line here too.
+constexpr std::size_t kShortestCompressed = 1024;
+constexpr std::size_t kFooterAlignment = 16;
+constexpr std::size_t kFooterZeros = 120;
+constexpr FileCode kFooterMagic{0xF8, 0x5A, 0x8C, 0x6A, 0xDE, 0xF5, 0xD9, 0x7E,
+                                0xEC, 0xE9, 0x0C, 0xE3, 0x75, 0x8F, 0x29, 0x0B};
+constexpr std::string_view kNameSeparator("\0\1", 2);
+/// Sizes of texts and arrays are 32 bits wide in every version.
+constexpr std::uint64_t kMaxValueBytes = std::numeric_limits<std::uint32_t>::max();
+
+/// The number's bytes in the file's order, which is little-endian.
+template <class Number>
+void storeNumber(char* bytes, Number number) {
+    auto bits = std::bit_cast<BitsOf<Number>>(number);
+    if (needsSwap(/*bigEndian*/ false)) {
+        bits = swapBytes(bits);
+    }
+    std::memcpy(bytes, &bits, sizeof bits);
+}
+
+std::span<const char> bytesOf(std::string_view text) { return {text.data(), text.size()}; }
+
+std::span<const char> bytesOf(const FileCode& code) {
+    return {reinterpret_cast<const char*>(code.data()), code.size()};
+}
+
+/// Packed elements in the file's byte order: the memory itself wherever that is the machine's order.
+template <class Number>
+std::span<const char> fileBytes(std::span<const Number> values, std::vector<char>& swapped) {
+    if (!needsSwap(/*bigEndian*/ false)) {
+        return {reinterpret_cast<const char*>(values.data()), values.size_bytes()};
+    }
+    swapped.resize(values.size_bytes());
+    for (std::size_t i = 0; i < values.size(); ++i) {
+        storeNumber(swapped.data() + i * sizeof(Number), values[i]);
+    }
+    return swapped;
+}
+
+} // namespace
+
+BinarySink::BinarySink(ByteOutput& output, std::uint32_t version, std::uint64_t maxNarrowSize)
+    : mOutput(output), mVersion(version), mWide(version >= kFirstWideVersion),
+      mMaxSize(mWide ? std::numeric_limits<std::uint64_t>::max() : maxNarrowSize) {
+    char versionBytes[4];
+    storeNumber(versionBytes, version);
+    mOutput.write(bytesOf(kMagic));
+    mOutput.write(versionBytes);
+}
+
+std::size_t BinarySink::headSize() const { return mWide ? 25 : 13; }
+
+void BinarySink::setFault(const std::string& fault) {
+    if (mFault.empty()) {
+        mFault = fault;
+    }
+}
+
+void BinarySink::writeZeros(std::size_t count) {
+    constexpr char kZeros[128] = {};
+    assert(count <= sizeof kZeros);
+    mOutput.write(std::span(kZeros, count));
+}
+
+void BinarySink::beginRecord(std::string_view name) {
+    assert(name.size() <= std::numeric_limits<std::uint8_t>::max());
+    assert(mOpen.empty() || mOpen.back().hasBlock);
+    const std::uint64_t start = mOutput.size();
+    char nameLength;
+    storeNumber(&nameLength, static_cast<std::uint8_t>(name.size()));
+    writeZeros(headSize() - 1);
+    mOutput.write({&nameLength, 1});
+    mOutput.write(bytesOf(name));
+    mOpen.push_back({.start = start, .valuesStart = start + headSize() + name.size()});
+}
+
+void BinarySink::beginBlock() {
+    assert(!mOpen.empty() && !mOpen.back().hasBlock);
+    mOpen.back().hasBlock = true;
+    mOpen.back().valuesEnd = mOutput.size();
+}
+
+void BinarySink::endRecord() {
+    assert(!mOpen.empty());
+    OpenRecord record = mOpen.back();
+    mOpen.pop_back();
+    if (record.hasBlock) {
+        writeZeros(headSize());
+    } else {
+        record.valuesEnd = mOutput.size();
+    }
+    if (mOutput.size() > mMaxSize) {
+        setFault("the file outgrows the " + std::to_string(mMaxSize) + " bytes that a binary file of version " +
+                 std::to_string(mVersion) + " can have; version " + std::to_string(kFirstWideVersion) + " can");
+    }
+    if (!failed()) {
+        patchHead(record);
+    }
+}
+
+void BinarySink::patchHead(const OpenRecord& record) {
+    const std::uint64_t fields[] = {mOutput.size(), record.valueCount, record.valuesEnd - record.valuesStart};
+    char head[3 * sizeof(std::uint64_t)];
+    std::size_t size = 0;
+    for (const std::uint64_t field : fields) {
+        if (mWide) {
+            storeNumber(head + size, field);
+            size += sizeof field;
+        } else {
+            storeNumber(head + size, static_cast<std::uint32_t>(field));
+            size += sizeof(std::uint32_t);
+        }
+    }
+    mOutput.overwrite(record.start, std::span(head, size));
+}
+
+template <class Number>
+void BinarySink::scalar(char code, Number value) {
+    assert(!mOpen.empty() && !mOpen.back().hasBlock);
+    char bytes[1 + sizeof(Number)];
+    bytes[0] = code;
+    storeNumber(bytes + 1, value);
+    mOutput.write(bytes);
+    ++mOpen.back().valueCount;
+}
+
+void BinarySink::byte(std::uint8_t value) { scalar('Z', value); }
+void BinarySink::shortInteger(std::int16_t value) { scalar('Y', value); }
+void BinarySink::integer(std::int32_t value) { scalar('I', value); }
+void BinarySink::longInteger(std::int64_t value) { scalar('L', value); }
+void BinarySink::singleReal(float value) { scalar('F', value); }
+void BinarySink::real(double value) { scalar('D', value); }
+void BinarySink::letter(char value) { scalar('C', value); }
+
+void BinarySink::sizedBytes(char code, std::string_view first, std::string_view second, std::string_view third) {
+    const std::uint64_t size = first.size() + second.size() + third.size();
+    if (size > kMaxValueBytes) {
+        setFault("a text of " + std::to_string(size) + " bytes is longer than a file can hold");
+        return;
+    }
+    scalar(code, static_cast<std::uint32_t>(size));
+    for (const std::string_view part : {first, second, third}) {
+        mOutput.write(bytesOf(part));
+    }
+}
+
+void BinarySink::text(std::string_view value) { sizedBytes('S', value); }
+
+void BinarySink::raw(std::span<const char> bytes) { sizedBytes('R', {bytes.data(), bytes.size()}); }
+
+void BinarySink::objectName(std::string_view className, std::string_view name) {
+    sizedBytes('S', name, kNameSeparator, className);
+}
+
+template <class Number>
+void BinarySink::arrayOf(char arrayCode, char scalarCode, std::span<const Number> values) {
+    if (mVersion >= kFirstVersionWithArrays) {
+        packedArray(arrayCode, values);
+    } else {
+        scalarList(scalarCode, values);
+    }
+}
+
+template <class Number>
+void BinarySink::packedArray(char code, std::span<const Number> values) {
+    if (values.size_bytes() > kMaxValueBytes) {
+        setFault("an array of " + std::to_string(values.size()) + " elements is longer than a file can hold");
+        return;
+    }
+    std::vector<char> swapped;
+    std::span<const char> bytes = fileBytes(values, swapped);
+    std::vector<char> stream;
+    if (bytes.size() >= kShortestCompressed) {
+        stream = deflated(bytes);
+    }
+    const bool compressed = !stream.empty();
+    if (compressed) {
+        bytes = stream;
+    }
+    scalar(code, static_cast<std::uint32_t>(values.size()));
+    char head[8];
+    storeNumber(head, std::uint32_t{compressed});
+    storeNumber(head + 4, static_cast<std::uint32_t>(bytes.size()));
+    mOutput.write(head);
+    mOutput.write(bytes);
+}
+
+template <class Number>
+void BinarySink::scalarList(char code, std::span<const Number> values) {
+    for (const Number value : values) {
+        scalar(code, value);
+    }
+}
+
+void BinarySink::array(std::span<const double> values) { arrayOf('d', 'D', values); }
+void BinarySink::array(std::span<const float> values) { arrayOf('f', 'F', values); }
+void BinarySink::array(std::span<const std::int32_t> values) { arrayOf('i', 'I', values); }
+void BinarySink::array(std::span<const std::int64_t> values) { arrayOf('l', 'L', values); }
+
+void BinarySink::array(std::span<const std::uint8_t> values) {
+    if (mVersion >= kFirstVersionWithArrays) {
+        packedArray('b', values);
+        return;
+    }
+    for (const std::uint8_t value : values) {
+        integer(value);
+    }
+}
+
+void BinarySink::floatBits(std::span<const std::uint32_t> words) { arrayOf('f', 'F', words); }
+
+void BinarySink::finish(const CreationTime& time) {
+    assert(mOpen.empty());
+    writeZeros(headSize());
+    mOutput.write(bytesOf(footerCode(time)));
+    // Aligned or not, there is padding.
+    writeZeros(kFooterAlignment - mOutput.size() % kFooterAlignment);
+    writeZeros(sizeof(std::uint32_t));
+    char versionBytes[4];
+    storeNumber(versionBytes, mVersion);
+    mOutput.write(versionBytes);
+    writeZeros(kFooterZeros);
+    mOutput.write(bytesOf(kFooterMagic));
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,88 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Records as binary files hold them.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "container/ByteOutput.h"
+#include "container/FileId.h"
+#include "container/RecordSink.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// The largest file that 32-bit record heads are trusted with: many readers take their offsets for signed.
+inline constexpr std::uint64_t kMaxNarrowFileSize = 0x7FFFFFFF;
+
+class BinarySink final : public RecordSink {
+public:
+    /// Writes the file's header. Record heads are 64 bits wide from version 7500 on; below, a file that outgrows
+    /// `maxNarrowSize` is a fault.
+    BinarySink(ByteOutput& output, std::uint32_t version, std::uint64_t maxNarrowSize = kMaxNarrowFileSize);
+
+    [[nodiscard]] bool isBinary() const override { return true; }
+    void beginRecord(std::string_view name) override;
+    void beginBlock() override;
+    void endRecord() override;
+
+    void byte(std::uint8_t value) override;
+    void shortInteger(std::int16_t value) override;
+    void integer(std::int32_t value) override;
+    void longInteger(std::int64_t value) override;
+    void singleReal(float value) override;
+    void real(double value) override;
+    void letter(char value) override;
+    void text(std::string_view value) override;
+    void raw(std::span<const char> bytes) override;
+    void objectName(std::string_view className, std::string_view name) override;
+
+    void array(std::span<const double> values) override;
+    void array(std::span<const float> values) override;
+    void array(std::span<const std::int32_t> values) override;
+    void array(std::span<const std::int64_t> values) override;
+    void array(std::span<const std::uint8_t> values) override;
+    void floatBits(std::span<const std::uint32_t> words) override;
+
+    [[nodiscard]] bool failed() const override { return !mFault.empty() || mOutput.failed(); }
+    /// What cannot be written in this version; empty when nothing is wrong but perhaps the output.
+    [[nodiscard]] const std::string& fault() const { return mFault; }
+
+    /// Ends the last list of records and writes the footer. All records must be ended.
+    void finish(const CreationTime& time);
+
+private:
+    struct OpenRecord {
+        std::uint64_t start;
+        std::uint64_t valuesStart;
+        std::uint64_t valuesEnd = 0; ///< set when the block begins
+        std::uint64_t valueCount = 0;
+        bool hasBlock = false;
+    };
+
+    [[nodiscard]] std::size_t headSize() const;
+    void setFault(const std::string& fault);
+    void patchHead(const OpenRecord& record);
+    void writeZeros(std::size_t count);
+    template <class Number>
+    void scalar(char code, Number value);
+    void sizedBytes(char code, std::string_view first, std::string_view second = {}, std::string_view third = {});
+    template <class Number>
+    void arrayOf(char arrayCode, char scalarCode, std::span<const Number> values);
+    template <class Number>
+    void packedArray(char code, std::span<const Number> values);
+    template <class Number>
+    void scalarList(char code, std::span<const Number> values);
+
+    ByteOutput& mOutput;
+    std::uint32_t mVersion;
+    bool mWide;
+    std::uint64_t mMaxSize;
+    std::string mFault;
+    std::vector<OpenRecord> mOpen;
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,70 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Where writers put records. A writer says what a record holds; the sink knows how a container spells it. Both sinks,
+// binary and ASCII, write the same tree, so that after reading nobody knows which one it was.
+#pragma once
+
+#include <cstdint>
+#include <span>
+#include <string_view>
+
+#include <fbxsdk/FbxArch.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// From this version on, number lists are arrays; before, they are a scalar per element.
+inline constexpr std::uint32_t kFirstVersionWithArrays = 7000;
+
+/// A record is begun, gets its values, then perhaps a block of further records, and is ended:
+///
+///     sink.beginRecord("Layer"); sink.integer(0); sink.beginBlock(); …records…; sink.endRecord();
+///
+/// Nothing is reported on the way: the first fault is kept, what follows it is ignored, and finish() says how it went.
+class RecordSink {
+public:
+    RecordSink() = default;
+    RecordSink(const RecordSink&) = delete;
+    RecordSink& operator=(const RecordSink&) = delete;
+    virtual ~RecordSink() = default;
+
+    [[nodiscard]] virtual bool isBinary() const = 0;
+
+    virtual void beginRecord(std::string_view name) = 0;
+    /// Opens the record's block; it stays even when nothing is put into it. At most once per record.
+    virtual void beginBlock() = 0;
+    virtual void endRecord() = 0;
+
+    virtual void byte(std::uint8_t value) = 0;
+    virtual void shortInteger(std::int16_t value) = 0;
+    virtual void integer(std::int32_t value) = 0;
+    virtual void longInteger(std::int64_t value) = 0;
+    virtual void singleReal(float value) = 0;
+    virtual void real(double value) = 0;
+    /// A one-letter code, as in `Shading: T`.
+    virtual void letter(char value) = 0;
+    virtual void text(std::string_view value) = 0;
+    /// Bytes that are no text.
+    virtual void raw(std::span<const char> bytes) = 0;
+    /// The name of an object together with the class that stands before it: `Model::cube`.
+    virtual void objectName(std::string_view className, std::string_view name) = 0;
+
+    virtual void array(std::span<const double> values) = 0;
+    virtual void array(std::span<const float> values) = 0;
+    virtual void array(std::span<const std::int32_t> values) = 0;
+    virtual void array(std::span<const std::int64_t> values) = 0;
+    /// Booleans; each element is 0 or 1.
+    virtual void array(std::span<const std::uint8_t> values) = 0;
+    /// 32-bit words that files keep as the bits of floats: the packed data of keys.
+    virtual void floatBits(std::span<const std::uint32_t> words) = 0;
+
+    /// A heading between top-level records, for human readers.
+    virtual void heading(std::string_view) {}
+
+    /// Whether something went wrong already. Long loops ask, to stop early.
+    [[nodiscard]] virtual bool failed() const = 0;
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,21 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Which generation is written, and what becomes of parts that it keeps elsewhere.
+#include "document/DocumentSections.h"
+#include "document/InlineShapeWriting.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+void writeDocument(WritableDocument& document, const VersionTraits& traits, RecordSink& sink) {
+    if (traits.inlineShapes)
+        moveShapesInline(document);
+    if (traits.idsAndTemplates)
+        writeGeneration7(document, traits, sink);
+    else
+        writeGeneration6(document, traits, sink);
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,60 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The usual records in one line each.
+#pragma once
+
+#include <initializer_list>
+#include <span>
+#include <string_view>
+
+#include "container/RecordSink.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+void writeInteger(RecordSink& sink, std::string_view name, std::int32_t value);
+void writeIntegers(RecordSink& sink, std::string_view name, std::initializer_list<std::int32_t> values);
+void writeLong(RecordSink& sink, std::string_view name, std::int64_t value);
+void writeLongs(RecordSink& sink, std::string_view name, std::initializer_list<std::int64_t> values);
+void writeReal(RecordSink& sink, std::string_view name, double value);
+void writeReals(RecordSink& sink, std::string_view name, std::initializer_list<double> values);
+void writeText(RecordSink& sink, std::string_view name, std::string_view value);
+void writeTexts(RecordSink& sink, std::string_view name, std::initializer_list<std::string_view> values);
+void writeLetter(RecordSink& sink, std::string_view name, char value);
+void writeEmpty(RecordSink& sink, std::string_view name);
+
+template <class Number>
+void writeArray(RecordSink& sink, std::string_view name, std::span<const Number> values) {
+    sink.beginRecord(name);
+    sink.array(values);
+    sink.endRecord();
+}
+
+/// A record with a block, open as long as the object lives.
+class BlockScope {
+public:
+    BlockScope(RecordSink& sink, std::string_view name) : mSink(sink) {
+        sink.beginRecord(name);
+        sink.beginBlock();
+    }
+    BlockScope(RecordSink& sink, std::string_view name, std::int32_t value) : mSink(sink) {
+        sink.beginRecord(name);
+        sink.integer(value);
+        sink.beginBlock();
+    }
+    BlockScope(RecordSink& sink, std::string_view name, std::string_view value) : mSink(sink) {
+        sink.beginRecord(name);
+        sink.text(value);
+        sink.beginBlock();
+    }
+    BlockScope(const BlockScope&) = delete;
+    BlockScope& operator=(const BlockScope&) = delete;
+    ~BlockScope() { mSink.endRecord(); }
+
+private:
+    RecordSink& mSink;
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,80 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Keys for writing.
+#include "scene/CurveConversion.h"
+
+#include <algorithm>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+DocumentCurve::Attribute attributeOf(const KeyAttributes& source) {
+    DocumentCurve::Attribute attribute;
+    attribute.flags = source.flags;
+    std::copy(source.data.begin(), source.data.end(), std::begin(attribute.data));
+    return attribute;
+}
+
+DocumentCurve::Extrapolation extrapolationOf(const Extrapolation& source) {
+    constexpr struct {
+        ExtrapolationType type;
+        char letter;
+    } kLetters[] = {{ExtrapolationType::repetition, 'R'},
+                    {ExtrapolationType::mirrorRepetition, 'M'},
+                    {ExtrapolationType::keepSlope, 'K'},
+                    {ExtrapolationType::relativeRepetition, 'A'}};
+    for (const auto& row : kLetters) {
+        if (row.type == source.type)
+            return {row.letter, source.count};
+    }
+    return {};
+}
+
+/// Whether old files have a letter for the key's tangents.
+bool hasLegacyForm(const KeyAttributes& attributes) {
+    const auto has = [&](std::uint32_t flag) { return (attributes.flags & flag) != 0; };
+    if (!has(KeyFlag::cubic) || has(KeyFlag::tangentTcb) || has(KeyFlag::tangentUser))
+        return true;
+    const bool plain = !has(KeyFlag::genericBreak) && !has(KeyFlag::genericClamp) &&
+                       !has(KeyFlag::genericClampProgressive) && !has(KeyFlag::genericTimeIndependent);
+    return plain && attributes.data[KeyData::rightSlope] == 0.0F && attributes.data[KeyData::nextLeftSlope] == 0.0F;
+}
+
+/// The key as a user would have to set it for the curve to be the same.
+DocumentCurve::Attribute userAttribute(const CurveKeys& keys, std::size_t key) {
+    constexpr std::uint32_t kAutomatic = KeyFlag::tangentAuto | KeyFlag::genericClamp |
+                                         KeyFlag::genericClampProgressive | KeyFlag::genericTimeIndependent;
+    DocumentCurve::Attribute attribute = attributeOf(keys.attributesOf(key));
+    attribute.flags = (attribute.flags & ~kAutomatic) | KeyFlag::tangentUser;
+    attribute.data[KeyData::rightSlope] = static_cast<float>(rightSlope(keys, key));
+    attribute.data[KeyData::nextLeftSlope] =
+        key + 1 < keys.keyCount() ? static_cast<float>(leftSlope(keys, key + 1)) : 0.0F;
+    return attribute;
+}
+
+} // namespace
+
+DocumentCurve documentCurve(const CurveKeys& keys, const VersionTraits& traits) {
+    DocumentCurve curve;
+    const auto count = static_cast<std::ptrdiff_t>(keys.keyCount());
+    curve.defaultValue = static_cast<double>(keys.defaultValue);
+    curve.times.assign(keys.times.begin(), keys.times.begin() + count);
+    curve.values.assign(keys.values.begin(), keys.values.begin() + count);
+    curve.pre = extrapolationOf(keys.before);
+    curve.post = extrapolationOf(keys.after);
+    const KeyAttributes* last = nullptr;
+    for (std::size_t key = 0; key < keys.keyCount(); ++key) {
+        const KeyAttributes& attributes = keys.attributesOf(key);
+        const bool kept = traits.idsAndTemplates || hasLegacyForm(attributes);
+        if (!kept || &attributes != last)
+            curve.attributes.push_back(kept ? attributeOf(attributes) : userAttribute(keys, key));
+        last = kept ? &attributes : nullptr;
+        curve.attributeIndex.push_back(static_cast<std::uint32_t>(curve.attributes.size() - 1));
+    }
+    return curve;
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

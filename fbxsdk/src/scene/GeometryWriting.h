@@ -1,0 +1,29 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The records of geometry and of what deforms it.
+#pragma once
+
+#include <fbxsdk/FbxGeometryBase.h>
+#include <fbxsdk/FbxMesh.h>
+#include <fbxsdk/FbxShape.h>
+
+#include "container/RecordSink.h"
+#include "document/VersionTraits.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// Everything behind the properties of a geometry: points, polygons, layers.
+void writeGeometryRecords(FbxGeometryBase& geometry, const VersionTraits& traits, RecordSink& sink);
+
+/// What stands before the properties of a skin, a cluster, a blend shape, one of its channels or a cache deformer …
+void writeDeformerVersion(const FbxObject& deformer, const VersionTraits& traits, RecordSink& sink);
+/// … and behind them.
+void writeDeformerRecords(FbxObject& deformer, const VersionTraits& traits, RecordSink& sink);
+
+/// The elements and layers of a geometry. Without edges there are no elements that are mapped by them.
+void writeLayers(FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits, RecordSink& sink);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

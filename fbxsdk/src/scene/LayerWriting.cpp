@@ -1,0 +1,319 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Layer elements and layers: the mirror of LayerReading. Elements come first, numbered within their type, then the
+// layers that name them.
+#include <algorithm>
+#include <map>
+#include <set>
+#include <stdexcept>
+#include <string_view>
+#include <vector>
+
+#include "document/RecordWriting.h"
+#include "geometry/LayerElementAccess.h"
+#include "scene/GeometryWriting.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+using Element = FbxLayerElement;
+using Access = LayerElementAccess;
+
+/// The element and the records that its arrays have.
+struct ElementRecords {
+    const Element& element;
+    const VersionTraits& traits;
+    RecordSink& sink;
+};
+
+template <class Item>
+using DirectArray = const FbxLayerElementArrayTemplate<Item>&;
+
+template <class Class>
+DirectArray<typename Class::ArrayElementType> directOf(const Element& element) {
+    return static_cast<const Class&>(element).GetDirectArray();
+}
+template <class Class>
+const FbxLayerElementArrayTemplate<int>& indicesOf(const Element& element) {
+    return static_cast<const Class&>(element).GetIndexArray();
+}
+
+std::span<const int> spanOf(const FbxLayerElementArrayTemplate<int>& array) {
+    return {array.GetLocked(), static_cast<std::size_t>(array.GetCount())};
+}
+
+/// The first `components` numbers of each item, packed.
+template <class Item>
+std::vector<double> packed(DirectArray<Item> array, int components) {
+    std::vector<double> numbers;
+    numbers.reserve(static_cast<std::size_t>(array.GetCount()) * static_cast<std::size_t>(components));
+    const Item* const items = array.GetLocked();
+    for (int i = 0; i < array.GetCount(); ++i) {
+        for (int component = 0; component < components; ++component)
+            numbers.push_back(items[i][component]);
+    }
+    return numbers;
+}
+
+template <class Class>
+void writeIndices(const ElementRecords& records, std::string_view name) {
+    if (records.element.GetReferenceMode() != Element::eDirect)
+        writeArray<std::int32_t>(records.sink, name, spanOf(indicesOf<Class>(records.element)));
+}
+
+/// Three numbers, and from 7.4 on the fourth in a list of its own.
+template <class Class>
+void writeVectors(const ElementRecords& records, std::string_view name, std::string_view fourthName,
+                  std::string_view indexName) {
+    DirectArray<FbxVector4> direct = directOf<Class>(records.element);
+    writeArray<double>(records.sink, name, packed<FbxVector4>(direct, 3));
+    constexpr int kFirstVersionWithFourth = 102;
+    if (records.traits.normalVersion >= kFirstVersionWithFourth) {
+        std::vector<double> fourth;
+        for (int i = 0; i < direct.GetCount(); ++i)
+            fourth.push_back(direct.GetAt(i)[3]);
+        writeArray<double>(records.sink, fourthName, fourth);
+    }
+    writeIndices<Class>(records, indexName);
+}
+
+void writeNormals(const ElementRecords& records) {
+    writeVectors<FbxLayerElementNormal>(records, "Normals", "NormalsW", "NormalsIndex");
+}
+void writeBinormals(const ElementRecords& records) {
+    writeVectors<FbxLayerElementBinormal>(records, "Binormals", "BinormalsW", "BinormalsIndex");
+}
+void writeTangents(const ElementRecords& records) {
+    writeVectors<FbxLayerElementTangent>(records, "Tangents", "TangentsW", "TangentsIndex");
+}
+
+void writeColors(const ElementRecords& records) {
+    DirectArray<FbxColor> direct = directOf<FbxLayerElementVertexColor>(records.element);
+    std::vector<double> numbers;
+    for (int i = 0; i < direct.GetCount(); ++i) {
+        const FbxColor color = direct.GetAt(i);
+        numbers.insert(numbers.end(), {color.mRed, color.mGreen, color.mBlue, color.mAlpha});
+    }
+    writeArray<double>(records.sink, "Colors", numbers);
+    writeIndices<FbxLayerElementVertexColor>(records, "ColorIndex");
+}
+
+void writeUVs(const ElementRecords& records) {
+    writeArray<double>(records.sink, "UV", packed<FbxVector2>(directOf<FbxLayerElementUV>(records.element), 2));
+    writeIndices<FbxLayerElementUV>(records, "UVIndex");
+}
+
+void writeSmoothing(const ElementRecords& records) {
+    writeArray<std::int32_t>(records.sink, "Smoothing", spanOf(directOf<FbxLayerElementSmoothing>(records.element)));
+}
+
+void writeCreases(const ElementRecords& records, std::string_view name) {
+    DirectArray<double> direct = directOf<FbxLayerElementCrease>(records.element);
+    writeArray<double>(records.sink, name, {direct.GetLocked(), static_cast<std::size_t>(direct.GetCount())});
+}
+void writeEdgeCreases(const ElementRecords& records) { writeCreases(records, "EdgeCrease"); }
+void writeVertexCreases(const ElementRecords& records) { writeCreases(records, "VertexCrease"); }
+
+template <class Class>
+void writeFlags(const ElementRecords& records, std::string_view name) {
+    DirectArray<bool> direct = directOf<Class>(records.element);
+    std::vector<std::uint8_t> flags;
+    for (int i = 0; i < direct.GetCount(); ++i)
+        flags.push_back(direct.GetAt(i) ? 1 : 0);
+    writeArray<std::uint8_t>(records.sink, name, flags);
+}
+void writeHoles(const ElementRecords& records) { writeFlags<FbxLayerElementHole>(records, "Hole"); }
+void writeVisibility(const ElementRecords& records) { writeFlags<FbxLayerElementVisibility>(records, "Visibility"); }
+
+void writePolygonGroups(const ElementRecords& records) {
+    const bool direct = records.element.GetReferenceMode() == Element::eDirect;
+    writeArray<std::int32_t>(records.sink, "PolygonGroup",
+                             spanOf(direct ? directOf<FbxLayerElementPolygonGroup>(records.element)
+                                           : indicesOf<FbxLayerElementPolygonGroup>(records.element)));
+}
+
+/// One number for all when nobody gave any: the first material or texture.
+template <class Class>
+void writeNumbers(const ElementRecords& records, std::string_view name) {
+    constexpr int kFirst[] = {0};
+    std::span<const int> numbers = spanOf(indicesOf<Class>(records.element));
+    if (numbers.empty() && records.element.GetMappingMode() == Element::eAllSame)
+        numbers = kFirst;
+    writeArray<std::int32_t>(records.sink, name, numbers);
+}
+void writeMaterials(const ElementRecords& records) { writeNumbers<FbxLayerElementMaterial>(records, "Materials"); }
+
+void writeTextures(const ElementRecords& records) {
+    writeText(records.sink, "BlendMode", "Translucent");
+    writeReal(records.sink, "TextureAlpha", 1);
+    writeNumbers<FbxLayerElementTexture>(records, "TextureId");
+}
+
+/// What "by reference" an element is called. Lists of numbers are never direct in files.
+enum class Reference { asSet, indexToDirect, index };
+
+struct ElementKind {
+    std::string_view record;
+    int slot;
+    int version;       ///< 0: that of normals
+    int legacyVersion; ///< in files before 7.0
+    Reference reference;
+    void (*write)(const ElementRecords& records);
+};
+
+/// The elements in the order of files.
+const ElementKind kKinds[] = {
+    {"LayerElementNormal", Element::eNormal, 0, 101, Reference::asSet, writeNormals},
+    {"LayerElementBinormal", Element::eBiNormal, 0, 101, Reference::asSet, writeBinormals},
+    {"LayerElementTangent", Element::eTangent, 0, 101, Reference::asSet, writeTangents},
+    {"LayerElementPolygonGroup", Element::ePolygonGroup, 101, 101, Reference::index, writePolygonGroups},
+    {"LayerElementColor", Element::eVertexColor, 101, 101, Reference::asSet, writeColors},
+    {"LayerElementSmoothing", Element::eSmoothing, 102, 102, Reference::asSet, writeSmoothing},
+    {"LayerElementEdgeCrease", Element::eEdgeCrease, 101, 100, Reference::asSet, writeEdgeCreases},
+    {"LayerElementVisibility", Element::eVisibility, 101, 101, Reference::asSet, writeVisibility},
+    {"LayerElementHole", Element::eHole, 101, 100, Reference::asSet, writeHoles},
+    {"LayerElementVertexCrease", Element::eVertexCrease, 101, 100, Reference::asSet, writeVertexCreases},
+    {"LayerElementMaterial", Element::eMaterial, 101, 101, Reference::indexToDirect, writeMaterials},
+};
+
+/// Textures and texture coordinates exist once for each channel.
+struct ChannelRow {
+    std::string_view textures, uvs;
+    Element::EType channel;
+};
+
+constexpr ChannelRow kChannels[] = {
+    {"LayerElementTexture", "LayerElementUV", Element::eTextureDiffuse},
+    {"LayerElementDiffuseFactorTextures", "LayerElementDiffuseFactorUV", Element::eTextureDiffuseFactor},
+    {"LayerElementEmissive_Textures", "LayerElementEmissiveUV", Element::eTextureEmissive},
+    {"LayerElementEmissiveFactorTextures", "LayerElementEmissiveFactorUV", Element::eTextureEmissiveFactor},
+    {"LayerElementAmbientTextures", "LayerElementAmbientUV", Element::eTextureAmbient},
+    {"LayerElementAmbientFactorTextures", "LayerElementAmbientFactorUV", Element::eTextureAmbientFactor},
+    {"LayerElementSpecularTextures", "LayerElementSpecularUV", Element::eTextureSpecular},
+    {"LayerElementSpecularFactorTextures", "LayerElementSpecularFactorUV", Element::eTextureSpecularFactor},
+    {"LayerElementShininessTextures", "LayerElementShininessUV", Element::eTextureShininess},
+    {"LayerElementNormalMapTextures", "LayerElementNormalMapUV", Element::eTextureNormalMap},
+    {"LayerElementBumpTextures", "LayerElementBumpUV", Element::eTextureBump},
+    {"LayerElementTransparentTextures", "LayerElementTransparentUV", Element::eTextureTransparency},
+    {"LayerElementTransparencyFactorTextures", "LayerElementTransparencyFactorUV", Element::eTextureTransparencyFactor},
+    {"LayerElementReflectionTextures", "LayerElementReflectionUV", Element::eTextureReflection},
+    {"LayerElementReflectionFactorTextures", "LayerElementReflectionFactorUV", Element::eTextureReflectionFactor},
+    {"LayerElementDisplacementTextures", "LayerElementDisplacementUV", Element::eTextureDisplacement},
+};
+
+std::vector<ElementKind> allKinds() {
+    std::vector<ElementKind> kinds(std::begin(kKinds), std::end(kKinds));
+    for (const ChannelRow& row : kChannels)
+        kinds.push_back({row.uvs, Access::uvSlot(row.channel), 101, 101, Reference::asSet, writeUVs});
+    for (const ChannelRow& row : kChannels)
+        kinds.push_back({row.textures, row.channel, 101, 101, Reference::indexToDirect, writeTextures});
+    return kinds;
+}
+
+std::string_view mappingName(Element::EMappingMode mode) {
+    switch (mode) {
+    case Element::eByControlPoint:
+        return "ByVertice";
+    case Element::eByPolygonVertex:
+        return "ByPolygonVertex";
+    case Element::eByPolygon:
+        return "ByPolygon";
+    case Element::eByEdge:
+        return "ByEdge";
+    case Element::eAllSame:
+        return "AllSame";
+    case Element::eNone:
+        break;
+    }
+    return "NoMappingInformation";
+}
+
+std::string_view referenceName(const Element& element, Reference reference) {
+    switch (reference) {
+    case Reference::index:
+        return "Index";
+    case Reference::indexToDirect:
+        return "IndexToDirect";
+    case Reference::asSet:
+        break;
+    }
+    return element.GetReferenceMode() == Element::eDirect ? "Direct" : "IndexToDirect";
+}
+
+class LayerWriter {
+public:
+    LayerWriter(FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits, RecordSink& sink)
+        : mContainer(container), mHasEdges(hasEdges), mTraits(traits), mSink(sink), mKinds(allKinds()) {}
+
+    void write() {
+        for (const ElementKind& kind : mKinds)
+            writeElements(kind);
+        for (int i = 0; i < mContainer.GetLayerCount(); ++i)
+            writeLayer(i);
+    }
+
+private:
+    /// Null for what cannot be written either.
+    [[nodiscard]] const Element* elementAt(const FbxLayer& layer, int slot) const {
+        const Element* element = Access::elementAt(layer, slot);
+        return element && (mHasEdges || element->GetMappingMode() != Element::eByEdge) ? element : nullptr;
+    }
+
+    /// An element that stands in several layers is written once.
+    void writeElements(const ElementKind& kind) {
+        std::int32_t count = 0;
+        for (int i = 0; i < mContainer.GetLayerCount(); ++i) {
+            const Element* element = elementAt(*mContainer.GetLayer(i), kind.slot);
+            if (!element || mNumbers.count({element, kind.slot}) > 0)
+                continue;
+            mNumbers[{element, kind.slot}] = count;
+            writeElement(kind, *element, count++);
+        }
+    }
+
+    void writeElement(const ElementKind& kind, const Element& element, std::int32_t number) {
+        const int version = kind.version == 0 ? mTraits.normalVersion : kind.version;
+        const BlockScope block(mSink, kind.record, number);
+        writeInteger(mSink, "Version", mTraits.idsAndTemplates ? version : kind.legacyVersion);
+        writeText(mSink, "Name", element.GetName());
+        writeText(mSink, "MappingInformationType", mappingName(element.GetMappingMode()));
+        writeText(mSink, "ReferenceInformationType", referenceName(element, kind.reference));
+        try {
+            kind.write({element, mTraits, mSink});
+        } catch (const std::runtime_error&) {
+            // A damaged element has no array; it is written without, and read as if it were not there.
+        }
+    }
+
+    void writeLayer(int index) {
+        const FbxLayer& layer = *mContainer.GetLayer(index);
+        const BlockScope block(mSink, "Layer", index);
+        writeInteger(mSink, "Version", 100);
+        for (const ElementKind& kind : mKinds) {
+            const Element* element = elementAt(layer, kind.slot);
+            if (!element)
+                continue;
+            const BlockScope entry(mSink, "LayerElement");
+            writeText(mSink, "Type", kind.record);
+            writeInteger(mSink, "TypedIndex", mNumbers.at({element, kind.slot}));
+        }
+    }
+
+    FbxLayerContainer& mContainer;
+    bool mHasEdges;
+    const VersionTraits& mTraits;
+    RecordSink& mSink;
+    std::vector<ElementKind> mKinds;
+    std::map<std::pair<const Element*, int>, std::int32_t> mNumbers; ///< of elements within their kind
+};
+
+} // namespace
+
+void writeLayers(FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits, RecordSink& sink) {
+    LayerWriter(container, hasEdges, traits, sink).write();
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,281 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What both sinks write, the readers read back: every type of value, in every layout.
+#include "container/RecordSink.h"
+
+#include <bit>
+#include <cmath>
+#include <limits>
+#include <random>
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "support/RecordText.h"
+#include "support/SinkOutput.h"
+
+namespace fbxsdk::detail {
+namespace {
+
+using support::Container;
+using support::sinkBytes;
+
+struct Layout {
+    Container container;
+    std::uint32_t version;
+};
+
+void PrintTo(const Layout& layout, std::ostream* stream) {
+    *stream << (layout.container == Container::ascii ? "ASCII " : "binary ") << layout.version;
+}
+
+/// A tree together with the bytes it points to.
+struct ReadBack {
+    std::string bytes;
+    std::unique_ptr<RecordTree> tree;
+};
+
+class SinkLayout : public testing::TestWithParam<Layout> {
+protected:
+    [[nodiscard]] static std::string bytesOf(const support::Emit& emit) {
+        return sinkBytes(GetParam().container, GetParam().version, emit);
+    }
+    /// The first record of what was written.
+    const Record& readBack(const support::Emit& emit) {
+        mBytes = bytesOf(emit);
+        FbxStatus status;
+        mTree = readRecords(std::span<const char>(mBytes), "test.fbx", status);
+        EXPECT_TRUE(mTree) << status.GetErrorString();
+        static const Record kNone;
+        return mTree && mTree->root.firstChild ? *mTree->root.firstChild : kNone;
+    }
+    template <class Number>
+    std::vector<Number> arrayBack(const std::vector<Number>& numbers) {
+        const Record& record = readBack([&](RecordSink& sink) {
+            sink.beginRecord("A");
+            sink.array(std::span(numbers));
+            sink.endRecord();
+        });
+        std::vector<Number> back(record.numberCount());
+        EXPECT_TRUE(record.readNumbers(std::span(back)));
+        return back;
+    }
+    [[nodiscard]] const RecordTree& tree() const { return *mTree; }
+    [[nodiscard]] static bool isBinary() { return GetParam().container == Container::binary; }
+
+private:
+    std::string mBytes;
+    std::unique_ptr<RecordTree> mTree;
+};
+
+INSTANTIATE_TEST_SUITE_P(EveryLayout, SinkLayout,
+                         testing::Values(Layout{Container::binary, 6100}, Layout{Container::binary, 7100},
+                                         Layout{Container::binary, 7400}, Layout{Container::binary, 7500},
+                                         Layout{Container::ascii, 6100}, Layout{Container::ascii, 7100},
+                                         Layout{Container::ascii, 7200}, Layout{Container::ascii, 7500}));
+
+TEST_P(SinkLayout, StatesItsVersion) {
+    readBack([](RecordSink&) {});
+
+    EXPECT_EQ(tree().version, GetParam().version);
+    EXPECT_EQ(tree().ascii, !isBinary());
+    EXPECT_EQ(tree().root.firstChild, nullptr);
+}
+
+TEST_P(SinkLayout, KeepsEveryKindOfWholeNumberAtItsLimits) {
+    const Record& record = readBack([](RecordSink& sink) {
+        sink.beginRecord("N");
+        sink.byte(255);
+        sink.shortInteger(-32768);
+        sink.integer(std::numeric_limits<std::int32_t>::min());
+        sink.longInteger(std::numeric_limits<std::int64_t>::min());
+        sink.longInteger(std::numeric_limits<std::int64_t>::max());
+        sink.endRecord();
+    });
+
+    ASSERT_EQ(record.values.size(), 5U);
+    EXPECT_EQ(record.value(0).toInteger(), 255);
+    EXPECT_EQ(record.value(1).toInteger(), -32768);
+    EXPECT_EQ(record.value(2).toInteger(), -2147483648LL);
+    EXPECT_EQ(record.value(3).toInteger(), std::numeric_limits<std::int64_t>::min());
+    EXPECT_EQ(record.value(4).toInteger(), std::numeric_limits<std::int64_t>::max());
+}
+
+TEST_P(SinkLayout, KeepsTheBitsOfReals) {
+    std::mt19937_64 random(7);
+    std::vector<double> numbers{0.0, -0.0, 1.0 / 3, 5e-324, std::numeric_limits<double>::max(), 25.114999771118164};
+    while (numbers.size() < 1000) {
+        const auto number = std::bit_cast<double>(random());
+        if (std::isfinite(number)) {
+            numbers.push_back(number);
+        }
+    }
+
+    const std::vector<double> back = arrayBack(numbers);
+
+    ASSERT_EQ(back.size(), numbers.size());
+    for (std::size_t i = 0; i < numbers.size(); ++i) {
+        EXPECT_EQ(std::bit_cast<std::uint64_t>(back[i]), std::bit_cast<std::uint64_t>(numbers[i])) << i;
+    }
+}
+
+TEST_P(SinkLayout, KeepsTheBitsOfFloats) {
+    std::mt19937 random(7);
+    std::vector<float> numbers{0.0F, -0.0F, 1.0F / 3, 1e-45F, std::numeric_limits<float>::max()};
+    while (numbers.size() < 1000) {
+        const auto number = std::bit_cast<float>(static_cast<std::uint32_t>(random()));
+        if (std::isfinite(number)) {
+            numbers.push_back(number);
+        }
+    }
+
+    const std::vector<float> back = arrayBack(numbers);
+
+    ASSERT_EQ(back.size(), numbers.size());
+    for (std::size_t i = 0; i < numbers.size(); ++i) {
+        EXPECT_EQ(std::bit_cast<std::uint32_t>(back[i]), std::bit_cast<std::uint32_t>(numbers[i])) << i;
+    }
+}
+
+TEST_P(SinkLayout, KeepsArraysOfWholeNumbers) {
+    std::vector<std::int32_t> small;
+    std::vector<std::int64_t> large;
+    for (std::int32_t i = -500; i < 500; ++i) {
+        small.push_back(i * 4000000);
+        large.push_back(i * std::int64_t{18446744073709551});
+    }
+
+    EXPECT_EQ(arrayBack(small), small);
+    EXPECT_EQ(arrayBack(large), large);
+}
+
+TEST_P(SinkLayout, KeepsArraysOfBooleans) {
+    const std::vector<std::uint8_t> flags{1, 0, 0, 1, 1};
+
+    const Record& record = readBack([&](RecordSink& sink) {
+        sink.beginRecord("B");
+        sink.array(std::span(flags));
+        sink.endRecord();
+    });
+
+    std::vector<std::int32_t> back(record.numberCount());
+    ASSERT_TRUE(record.readNumbers(std::span(back)));
+    EXPECT_EQ(back, std::vector<std::int32_t>({1, 0, 0, 1, 1}));
+}
+
+TEST_P(SinkLayout, KeepsArraysWithoutElements) {
+    EXPECT_TRUE(arrayBack(std::vector<double>()).empty());
+    EXPECT_TRUE(arrayBack(std::vector<std::int32_t>()).empty());
+}
+
+TEST_P(SinkLayout, KeepsTheBitsOfPackedKeyData) {
+    const std::vector<std::uint32_t> words{0, 0x3F800000, 0x0D050D05, 0x26AB26AB, 0x80000000, 0x00000001};
+
+    const Record& record = readBack([&](RecordSink& sink) {
+        sink.beginRecord("KeyAttrDataFloat");
+        sink.floatBits(words);
+        sink.endRecord();
+    });
+
+    std::vector<std::uint32_t> back(record.numberCount());
+    ASSERT_TRUE(record.readFloatBits(back));
+    EXPECT_EQ(back, words);
+}
+
+TEST_P(SinkLayout, KeepsTextsWithQuotesColonsLineBreaksAndNothing) {
+    const std::string texts[] = {"",
+                                 "plain",
+                                 "a \"quoted\" one",
+                                 "first\nsecond\r\nthird",
+                                 "C:\\folder\\x",
+                                 "a::b; c",
+                                 "{ not, a: block",
+                                 "größe 寸法 🎥",
+                                 "&amp; & &lt;"};
+
+    const Record& record = readBack([&](RecordSink& sink) {
+        sink.beginRecord("T");
+        for (const std::string& text : texts) {
+            sink.text(text);
+        }
+        sink.endRecord();
+    });
+
+    ASSERT_EQ(record.values.size(), std::size(texts));
+    for (std::size_t i = 0; i < std::size(texts); ++i) {
+        EXPECT_EQ(record.value(i).toText(), texts[i]);
+    }
+}
+
+TEST_P(SinkLayout, KeepsLetters) {
+    const Record& record = readBack([](RecordSink& sink) {
+        sink.beginRecord("Shading");
+        sink.letter('T');
+        sink.endRecord();
+    });
+
+    EXPECT_EQ(record.value(0).toLetter(), 'T');
+}
+
+TEST_P(SinkLayout, PutsTheClassBeforeOrBehindTheName) {
+    const Record& record = readBack([](RecordSink& sink) {
+        sink.beginRecord("Model");
+        sink.objectName("Model", "a \"b\"::c");
+        sink.objectName("NodeAttribute", "");
+        sink.endRecord();
+    });
+
+    using namespace std::string_view_literals;
+    EXPECT_EQ(record.value(0).toText(), isBinary() ? "a \"b\"::c\0\1Model"sv : "Model::a \"b\"::c"sv);
+    EXPECT_EQ(record.value(1).toText(), isBinary() ? "\0\1NodeAttribute"sv : "NodeAttribute::"sv);
+}
+
+TEST_P(SinkLayout, KeepsTheNestingAndEmptyBlocks) {
+    const std::string text = readText(bytesOf([](RecordSink& sink) {
+        sink.beginRecord("References");
+        sink.beginBlock();
+        sink.endRecord();
+        sink.beginRecord("Objects");
+        sink.beginBlock();
+        sink.beginRecord("Model");
+        sink.longInteger(17);
+        sink.beginBlock();
+        sink.beginRecord("Version");
+        sink.integer(232);
+        sink.endRecord();
+        sink.beginRecord("Nothing");
+        sink.endRecord();
+        sink.endRecord();
+        sink.beginRecord("After");
+        sink.text("it");
+        sink.endRecord();
+        sink.endRecord();
+    }));
+
+    EXPECT_EQ(text, "References: { } Objects: { Model: 17 { Version: 232 Nothing: } After: \"it\" }");
+}
+
+TEST_P(SinkLayout, GivesTheSameBytesAgain) {
+    const auto emit = [](RecordSink& sink) {
+        sink.heading("Heading");
+        sink.beginRecord("A");
+        sink.array(std::span<const double>(std::vector<double>(5000, 1.5)));
+        sink.endRecord();
+    };
+
+    EXPECT_EQ(bytesOf(emit), bytesOf(emit));
+}
+
+TEST_P(SinkLayout, WritesListsOfAHundredThousandElements) {
+    std::vector<double> numbers(100000);
+    for (std::size_t i = 0; i < numbers.size(); ++i) {
+        numbers[i] = static_cast<double>(i) / 7;
+    }
+
+    EXPECT_EQ(arrayBack(numbers), numbers);
+}
+
+} // namespace
+} // namespace fbxsdk::detail
