@@ -4,9 +4,11 @@
 // Damaged and hostile files through the facade: a false result with a reason, or objects; never more memory than the
 // file is worth.
 #include <filesystem>
+#include <fstream>
 #include <memory>
 #include <random>
 #include <string>
+#include <vector>
 
 #include <gtest/gtest.h>
 
@@ -17,6 +19,7 @@
 #include "TnFbxMarker.h"
 #include "TnFbxMesh.h"
 #include "TnFbxNull.h"
+#include "TnFbxReadInfo.h"
 #include "support/TemporaryFolder.h"
 
 namespace Tarnell::Fbx {
