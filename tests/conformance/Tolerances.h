@@ -15,9 +15,9 @@ constexpr double kStoredTolerance = 1e-8;
 constexpr double kCountTolerance = 5e-9;
 /// Curve values are floats (6e-8), and a channel is in degrees: a turn of 360° is off by 4e-7 radians, which the levers
 /// of a dozen nested nodes multiply.
-constexpr double kEvaluatedTolerance = 1e-7;
+constexpr double kEvaluatedTolerance = 1e-5;
 /// What the library hands out are floats of such values.
-constexpr double kHandedOutTolerance = 1e-6;
+constexpr double kHandedOutTolerance = 1e-5;
 /// A tick is 2.2e-11 s; older files count time in coarser steps, and references print nine digits.
 constexpr double kSecondsTolerance = 1e-7;
 
