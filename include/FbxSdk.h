@@ -147,7 +147,7 @@ public:
     static constexpr std::int64_t kMaxSamplesPerList = std::int64_t{1} << 29;
     // A list read from a file holds at most this many samples, and so many more for every byte of the file: a few bytes
     // that claim an endless animation cost no more memory than a file that has one.
-    static constexpr std::int64_t kSamplesOfAnyFile = std::int64_t{1} << 23;
+    static constexpr std::int64_t kSamplesOfAnyFile = std::int64_t{1} << 24;
     static constexpr std::int64_t kSamplesPerFileByte = 128;
 
     bool getMeshes(TnFbxReadInfo& info, TnFbxMesh* meshes, int count);
