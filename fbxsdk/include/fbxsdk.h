@@ -28,6 +28,7 @@
 #include <fbxsdk/FbxDeformer.h>
 #include <fbxsdk/FbxDocument.h>
 #include <fbxsdk/FbxEuler.h>
+#include <fbxsdk/FbxExporter.h>
 #include <fbxsdk/FbxGeometry.h>
 #include <fbxsdk/FbxGeometryBase.h>
 #include <fbxsdk/FbxGeometryConverter.h>
@@ -61,6 +62,7 @@
 #include <fbxsdk/FbxProperty.h>
 #include <fbxsdk/FbxQuaternion.h>
 #include <fbxsdk/FbxScene.h>
+#include <fbxsdk/FbxSceneRenamer.h>
 #include <fbxsdk/FbxShape.h>
 #include <fbxsdk/FbxSkeleton.h>
 #include <fbxsdk/FbxSkin.h>

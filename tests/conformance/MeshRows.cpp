@@ -110,7 +110,7 @@ void comparePoints(LoadedFile& file, std::size_t nodeIndex, Findings& findings) 
             return "\"" + node.name + "\" point " + std::to_string(point) + " at frame " +
                    printed(reference.frames[f]) + ": " +
                    (point < actual.size() ? printed(actual[point].data(), 3) : "nothing") + " instead of " +
-                   printed(&expected[3 * sample], 3);
+                   (expected.empty() ? "nothing" : printed(&expected[3 * sample], 3));
         });
     }
 }

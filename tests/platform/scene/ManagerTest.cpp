@@ -53,6 +53,7 @@ TEST(FbxManagerTest, TakesObjectsInEveryStateAlong) {
     FbxScene* scene = FbxScene::Create(manager, "scene");
     FbxScene* other = FbxScene::Create(manager, "other");
     FbxImporter::Create(manager, "")->Initialize("/nowhere/at/all.fbx");
+    FbxExporter::Create(manager, "");
     FbxNode* loose = FbxNode::Create(manager, "loose");
     FbxNode* node = FbxNode::Create(scene, "node");
     node->LclTranslation.ConnectSrcProperty(loose->LclTranslation);

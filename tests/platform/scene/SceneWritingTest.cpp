@@ -102,7 +102,7 @@ TEST_P(SceneWriting, KeepsEveryTransformPropertyOfANode) {
     node->SetGeometricTranslation(FbxNode::eSourcePivot, FbxVector4(0.1, 0.2, 0.3));
     node->SetGeometricRotation(FbxNode::eSourcePivot, FbxVector4(40, 50, 60));
     node->SetGeometricScaling(FbxNode::eSourcePivot, FbxVector4(3, 4, 5));
-    node->InheritType.Set(FbxTransform::eInheritRrs);
+    node->SetTransformationInheritType(FbxTransform::eInheritRrs);
     node->Visibility.Set(0.0);
     node->SetShadingMode(FbxNode::eTextureShading);
 
