@@ -1,7 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a host calls: each operation opens one FBX file, takes from it what was asked for and closes it again.
+// What a host calls: each operation opens one FBX file, takes from it what was asked for and closes it
+// again, or writes one.
 #pragma once
 
 #include "TnFbxExport.h"
@@ -19,6 +20,7 @@ class TnFbxMesh;
 class TnFbxNull;
 class TnFbxReadInfo;
 class TnFbxTransform;
+class TnFbxWriteInfo;
 
 /// The facade. It has no state: any number of threads may call any number of facades.
 ///
@@ -64,6 +66,14 @@ public:
     bool getNulls(TnFbxReadInfo& info, TnFbxNull** objects, int& count) const;
     /// Nulls, markers and meshes; NURBS surfaces as with `getNulls`.
     bool getTransforms(TnFbxReadInfo& info, TnFbxTransform** objects, int& count) const;
+
+    /// Writes one file, and beside it the point caches of animated meshes. The objects are only read; null pointers are
+    /// left out, and so are kinds that `info` does not ask for. There are no markers: they are read but never written.
+    /// False when `info` names no file or no animation stack, and when the file cannot be written. Curves go into the
+    /// stack "Take 001", whatever the name.
+    bool writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
+                   const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
+                   const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const;
 };
 
 } // namespace Tarnell::Fbx

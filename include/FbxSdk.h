@@ -1,7 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The adapter between the value classes and the FBX platform: one manager with one scene, loaded, walked and read.
+// The adapter between the value classes and the FBX platform: one manager with one scene, loaded, walked and read, or
+// built and saved.
 // Hosts reach it through `Fbx`, which makes one for every call.
 #pragma once
 
@@ -14,6 +15,7 @@
 #include "TnFbxReadInfo.h"
 #include "TnFbxTime.h"
 #include "TnFbxTransform.h"
+#include "TnFbxWriteInfo.h"
 
 #include <fbxsdk.h>
 
@@ -27,10 +29,11 @@ namespace detail {
 class PropertySampler;
 }
 
-/// One scene and what can be read from it.
+/// One scene, and what can be read from it or written into it.
 ///
-/// The order of calls is `initFbxSdkManager`, `loadScene`, any number of queries, `destroyFbxSdkManager`; the
-/// destructor makes up for a missing last one. A context belongs to one thread at a time; contexts share nothing.
+/// The order of calls is `initFbxSdkManager`, `loadScene` and any number of queries, or `createScene` and `saveScene`,
+/// then `destroyFbxSdkManager`; the destructor makes up for a missing last one. A context belongs to one thread at a
+/// time; contexts share nothing.
 ///
 /// An operation whose result is a success or a failure sets `lastError()`; one whose false is an answer (a walk that
 /// found nothing, a mesh without deformers) leaves it alone. Scene objects are passed as pointers of the platform and
@@ -280,7 +283,88 @@ public:
     void matrixAddToDiagonal(fbxsdk::FbxAMatrix& matrix, double value);
     void matrixAdd(fbxsdk::FbxAMatrix& matrix, fbxsdk::FbxAMatrix& other);
 
+    // ---- Building a scene ----
+    //
+    // What is made here belongs to the manager and stays when a later step fails. Names go into the scene as they are.
+
+    /// Global settings, animation stack and one node below the root per object, of the kinds that `info` asks for:
+    /// cameras, lights, transforms, nulls, meshes, each in the order of its list. Null pointers and meshes without
+    /// geometry are left out. Curves go into the stack "Take 001", whatever the name in `info`. Point caches of
+    /// animated meshes are written at once, next to where the scene will be saved. False when the context is not
+    /// initialised. Throws std::runtime_error when a layer element has no direct array.
+    bool createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
+                     const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
+                     const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes);
+
+    /// The global settings of a scene, and the stack of that name selected if the context's scene has one. False for a
+    /// null manager or scene.
+    bool createScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, float framesPerSecond,
+                     const std::string& animationStackName);
+
+    // The global settings one by one; false for a null scene.
+
+    /// A fixed ambient colour and fog.
+    bool setGlobalLightSettings(fbxsdk::FbxScene* scene);
+    /// The camera switcher as default camera, and the producer cameras.
+    bool setGlobalCameraSettings(fbxsdk::FbxScene* scene);
+    /// The time mode within 0.00001 of the rate, a custom one when there is none.
+    bool setGlobalTimeSettings(fbxsdk::FbxScene* scene, float framesPerSecond);
+
+    // A node with its attribute, not below the root yet; null when an argument is.
+
+    fbxsdk::FbxNode* createCamera(fbxsdk::FbxScene* scene, const std::string& name);
+    fbxsdk::FbxNode* createNull(fbxsdk::FbxManager* manager, const std::string& name);
+    fbxsdk::FbxNode* createLight(fbxsdk::FbxScene* scene, TnFbxLight::EFbxLightType type, const std::string& name);
+    /// The first set of points, and normals, texture coordinates and colours by polygon vertex where they are valid.
+    /// Null also for a mesh without polygons, points or polygon vertices, and for one whose polygons claim far more
+    /// polygon vertices than there are.
+    fbxsdk::FbxNode* createMesh(fbxsdk::FbxManager* manager, const TnFbxMesh* mesh, const std::string& name);
+
+    /// A texture mapped by the texture coordinates, as large as it is; null for a null scene.
+    fbxsdk::FbxFileTexture* createTexture(fbxsdk::FbxScene* scene, const std::string& fileName);
+    /// A grey material whose name is `name` followed by `index`; null for a null manager.
+    fbxsdk::FbxSurfaceLambert* createLambertMaterial(fbxsdk::FbxManager* manager, const std::string& name, int index);
+
+    // ---- Writing the channels of an object ----
+    //
+    // Onto a node and its attribute: static values into the properties, samples as linear keys into the first layer of
+    // the current stack. What was written before a failure stays.
+
+    /// The static value of a channel as the curve's default, as it is, and its samples, times `scale`, as keys at the
+    /// channel's own rate. False for a null argument.
+    bool setCurveValues(fbxsdk::FbxAnimCurve* curve, TnFbxChannel* channel, float scale) const;
+
+    // False for a null argument and for a node without the attribute of its kind.
+
+    /// Position, rotation, scale and rotation order; neither skew nor pivot.
+    bool setTransformCurveValues(fbxsdk::FbxNode* node, TnFbxTransform* transform);
+    bool setCameraCurveValues(fbxsdk::FbxNode* node, TnFbxCamera* camera);
+    bool setLightCurveValues(fbxsdk::FbxNode* node, TnFbxLight* light);
+    bool setNullCurveValues(fbxsdk::FbxNode* node, TnFbxNull* null);
+
+    // ---- Point caches and saving ----
+
+    /// A vertex cache on the node's mesh: "<node>.xml" or ".pc2" in the folder "<file>_fpc" beside the FBX file, which
+    /// is made. False for a null argument, an empty file name, a node without geometry or whose name leads out of the
+    /// folder, and when the folder cannot be made.
+    bool mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* meshNode, bool mayaFormat,
+                              const std::string& fbxFileName);
+
+    /// Writes the mesh's sets of points, one per frame of `time`, into the file of the node's vertex cache.
+    /// False for a null argument, when there is not exactly one set per frame or no cache, and when the file cannot be
+    /// written; where it cannot be opened, standard output says so too.
+    bool animateVertexCacheOnMesh(fbxsdk::FbxNode* meshNode, const TnFbxMesh* mesh, bool mayaFormat, bool useMcxFormat,
+                                  const TnFbxTime& time);
+
+    /// Writes the context's scene into the file that `info` names, in its format and version.
+    bool saveScene(const TnFbxWriteInfo& info);
+
+    /// With `embedMedia` the file is binary, whatever `asciiFormat` says. A version that is none means the newest.
+    bool saveScene(fbxsdk::FbxManager* manager, fbxsdk::FbxDocument* document, const std::string& fileName,
+                   bool asciiFormat, TnFbxWriteInfo::eCompatibilityVersion version, bool embedMedia);
+
 private:
+    fbxsdk::FbxAnimLayer* currentLayer() const;
     template <class Object>
     bool readList(TnFbxReadInfo& info, Object* objects, int count);
     bool readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count, int& index);

@@ -153,4 +153,22 @@ bool Fbx::getTransforms(TnFbxReadInfo& info, TnFbxTransform** objects, int& coun
     return read(*this, info, objects, count);
 }
 
+bool Fbx::writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
+                    const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
+                    const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const {
+    if (info.getFileName().empty()) {
+        return fail("the write options name no file");
+    }
+    if (info.getAnimationStackName().empty()) { // kept: the name is asked for, though the written stack bears another
+        return fail("the write options name no animation stack");
+    }
+    FbxSdk sdk;
+    if (!sdk.initFbxSdkManager()) {
+        return false;
+    }
+    const bool result = sdk.createScene(info, cameras, lights, transforms, nulls, meshes) && sdk.saveScene(info);
+    sdk.destroyFbxSdkManager();
+    return result;
+}
+
 } // namespace Tarnell::Fbx

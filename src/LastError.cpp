@@ -26,6 +26,11 @@ bool detail::fail(std::string reason) {
     return false;
 }
 
+bool detail::failAbout(const std::string& fileName, const char* reason, const char* standIn) {
+    std::string text = reason != nullptr && *reason != '\0' ? reason : standIn;
+    return fail(text.compare(0, fileName.size(), fileName) == 0 ? std::move(text) : fileName + ": " + text);
+}
+
 bool detail::succeed() {
     lastReason().clear();
     return true;

@@ -11,6 +11,10 @@ namespace Tarnell::Fbx::detail {
 /// Notes why the operation fails. Always false, so that failing is one line: `return fail("no node");`.
 bool fail(std::string reason);
 
+/// The same, with the name of the file in front, unless the reason names it already. `standIn` is the reason when there
+/// is none.
+bool failAbout(const std::string& fileName, const char* reason, const char* standIn);
+
 /// Forgets the last failure. Always true.
 bool succeed();
 

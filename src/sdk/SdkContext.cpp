@@ -17,6 +17,7 @@
 namespace Tarnell::Fbx {
 
 using detail::fail;
+using detail::failAbout;
 using detail::succeed;
 
 const std::string FbxSdk::kMayaVertexCacheFileExtension = ".xml";
@@ -41,12 +42,6 @@ constexpr const char* kImportSettings[] = {
 fbxsdk::FbxAxisSystem targetAxisSystem() {
     using System = fbxsdk::FbxAxisSystem;
     return System(System::eYAxis, System::eParityOdd, System::eRightHanded);
-}
-
-/// Names the file, unless the reason does so already.
-std::string reasonFor(const std::string& fileName, const char* reason) {
-    std::string text = reason != nullptr && *reason != '\0' ? reason : "cannot be read";
-    return text.compare(0, fileName.size(), fileName) == 0 ? text : fileName + ": " + text;
 }
 
 /// kept: the settings go to neither the importer nor the manager, so a read always runs with the platform's own
@@ -167,7 +162,8 @@ bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, con
     }
     fbxsdk::FbxImporter* importer = fbxsdk::FbxImporter::Create(manager, "");
     if (!importer->Initialize(fileName.c_str(), /*pFileFormat: detect*/ -1, /*pIOSettings*/ nullptr)) {
-        return fail(reasonFor(fileName, importer->GetStatus().GetErrorString())); // the manager releases the importer
+        // the manager releases the importer
+        return failAbout(fileName, importer->GetStatus().GetErrorString(), "cannot be read");
     }
     if (importer->IsFBX()) {
         const int takeCount = importer->GetAnimStackCount();
@@ -177,7 +173,8 @@ bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, con
         createImportSettings(manager);
     }
     const bool imported = importer->Import(scene, /*pNonBlocking*/ false);
-    const bool result = imported ? succeed() : fail(reasonFor(fileName, importer->GetStatus().GetErrorString()));
+    const bool result =
+        imported ? succeed() : failAbout(fileName, importer->GetStatus().GetErrorString(), "cannot be read");
     importer->Destroy(/*pRecursive*/ false);
     return result;
 }

@@ -1,0 +1,116 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Curves, and the channels that every object has: position, rotation and scale of its node. Nulls have no others.
+#include "CurveWriting.h"
+
+#include "LastError.h"
+#include "PropertySampling.h"
+
+namespace Tarnell::Fbx {
+
+using detail::channelAfter;
+using detail::ChannelWriter;
+using detail::fail;
+using detail::kComponents;
+using detail::succeed;
+
+namespace {
+
+/// A linear key for every frame of the channel's range.
+void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float scale) {
+    const TnFbxTime range = channel.getTime();
+    const auto rate = static_cast<double>(range.getFrameRate());
+    // wider than a frame, so that the count can pass the last int
+    for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
+        const float value = channel.getAnimatedValue(static_cast<float>(frame));
+        fbxsdk::FbxTime time;
+        time.SetSecondDouble(static_cast<double>(frame) / rate);
+        curve.KeySet(curve.KeyAdd(time), time, value * scale, fbxsdk::FbxAnimCurveDef::eInterpolationLinear);
+    }
+}
+
+using LocalProperty = fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3> fbxsdk::FbxNode::*;
+
+struct LocalRow {
+    LocalProperty property;
+    TnFbxTransform::EFbxTransformChannelType firstChannel;
+};
+
+constexpr LocalRow kLocalRows[] = {
+    {&fbxsdk::FbxNode::LclTranslation, TnFbxTransform::kFbxTransformPositionX},
+    {&fbxsdk::FbxNode::LclRotation, TnFbxTransform::kFbxTransformRotationX},
+    {&fbxsdk::FbxNode::LclScaling, TnFbxTransform::kFbxTransformScaleX},
+};
+
+fbxsdk::FbxDouble3 staticValues(const TnFbxTransform& transform, TnFbxTransform::EFbxTransformChannelType first) {
+    fbxsdk::FbxDouble3 values;
+    for (int i = 0; i < 3; ++i) {
+        values[i] = static_cast<double>(transform.getTransformValue(channelAfter(first, i)));
+    }
+    return values;
+}
+
+} // namespace
+
+bool FbxSdk::setCurveValues(fbxsdk::FbxAnimCurve* curve, TnFbxChannel* channel, float scale) const {
+    if (curve == nullptr || channel == nullptr) {
+        return fail("no curve or no channel to write");
+    }
+    curve->SetValue(channel->getValue(), /*pCurveNodeIndex*/ 0); // kept: not scaled, although the keys are
+    if (channel->getAnimated()) {
+        curve->KeyModifyBegin();
+        addKeys(*curve, *channel, scale);
+        curve->KeyModifyEnd();
+    }
+    return succeed();
+}
+
+/// The layer that is written to; null without a stack or layer.
+fbxsdk::FbxAnimLayer* FbxSdk::currentLayer() const {
+    return mCurrentAnimStack != nullptr ? mCurrentAnimStack->GetSrcObject<fbxsdk::FbxAnimLayer>(0) : nullptr;
+}
+
+// kept: skew and pivot are not written
+bool FbxSdk::setTransformCurveValues(fbxsdk::FbxNode* node, TnFbxTransform* transform) {
+    if (node == nullptr || transform == nullptr) {
+        return fail("no node or no transform to write");
+    }
+    for (const LocalRow& row : kLocalRows) {
+        (node->*row.property).Set(staticValues(*transform, row.firstChannel));
+    }
+    const ChannelWriter writer(*this, currentLayer());
+    for (const LocalRow& row : kLocalRows) {
+        for (int i = 0; i < 3; ++i) {
+            TnFbxChannel* channel = transform->getTransformChannel(channelAfter(row.firstChannel, i));
+            writer.key(node->*row.property, kComponents[i], channel);
+        }
+    }
+    node->SetRotationOrder(fbxsdk::FbxNode::eSourcePivot,
+                           getRotationOrderConstant(transform->getTransformRotationOrder()));
+    return succeed();
+}
+
+bool FbxSdk::setNullCurveValues(fbxsdk::FbxNode* node, TnFbxNull* null) {
+    fbxsdk::FbxNull* target = node != nullptr ? node->GetNull() : nullptr;
+    if (target == nullptr || null == nullptr) {
+        return fail("no node with a null, or no null to write");
+    }
+    if (!setTransformCurveValues(node, null)) {
+        return false;
+    }
+    switch (null->getNullLookType()) {
+    case TnFbxNull::kFbxNullLookNone:
+        target->Look.Set(fbxsdk::FbxNull::eNone);
+        break;
+    case TnFbxNull::kFbxNullLookCross:
+        target->Look.Set(fbxsdk::FbxNull::eCross);
+        break;
+    default: // a number that is no look: the null keeps the look it has
+        break;
+    }
+    target->Size.Set(static_cast<double>(null->getNullSize()));
+    return succeed();
+}
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,171 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A node with a new mesh: points, polygons, and one layer with what the polygon vertices carry.
+#include "FbxSdk.h"
+
+#include "LastError.h"
+
+#include <algorithm>
+#include <limits>
+
+namespace Tarnell::Fbx {
+
+using detail::fail;
+using detail::succeed;
+
+namespace {
+
+using Element = fbxsdk::FbxLayerElement;
+
+/// How many polygon vertices the polygons may claim beyond those that there are. Each becomes a corner at point 0; the
+/// limit keeps a wrong size from making thousands of millions of them.
+constexpr std::int64_t kMostMissingCorners = 65536;
+
+double widen(float value) { return static_cast<double>(value); }
+
+fbxsdk::FbxVector4 point(float x, float y, float z) { return {widen(x), widen(y), widen(z), 1.0}; }
+
+/// Null, or why there is nothing to make a mesh of.
+const char* faultOf(const TnFbxMesh& mesh) {
+    if (mesh.getNumberOfControlPoints() < 1 || mesh.getNumberOfPolygons() < 1 ||
+        mesh.getNumberOfPolygonVertices() < 1) {
+        return "the mesh has no geometry";
+    }
+    std::int64_t corners = 0;
+    for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon) {
+        corners += std::max(mesh.getPolygonVertexSize(polygon), 0);
+    }
+    const bool fits = corners <= mesh.getNumberOfPolygonVertices() + kMostMissingCorners &&
+                      corners <= std::numeric_limits<int>::max();
+    return fits ? nullptr : "the polygons have more polygon vertices than the mesh";
+}
+
+/// The first set.
+void setPoints(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
+    const int count = mesh.getNumberOfControlPoints();
+    target.InitControlPoints(count);
+    fbxsdk::FbxVector4* points = target.GetControlPoints();
+    for (int i = 0; i < count; ++i) {
+        float x = 0.0f, y = 0.0f, z = 0.0f;
+        mesh.getControlPoint(i, x, y, z);
+        points[i] = point(x, y, z);
+    }
+}
+
+void setNormals(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer& layer) {
+    auto* normals = fbxsdk::FbxLayerElementNormal::Create(&target, "");
+    normals->SetMappingMode(Element::eByPolygonVertex);
+    normals->SetReferenceMode(Element::eDirect);
+    auto& direct = normals->GetDirectArray();
+    for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
+        float x = 0.0f, y = 0.0f, z = 0.0f;
+        mesh.getNormal(i, x, y, z);
+        direct.Add(point(x, y, z));
+    }
+    layer.SetNormals(normals);
+}
+
+/// One value per polygon vertex, and indices that count them.
+template <class MappedElement, class ValueAt>
+void fillIndexed(MappedElement& element, int count, ValueAt valueAt) {
+    element.SetMappingMode(Element::eByPolygonVertex);
+    element.SetReferenceMode(Element::eIndexToDirect);
+    auto& direct = element.GetDirectArray();
+    auto& indices = element.GetIndexArray();
+    indices.SetCount(count);
+    for (int i = 0; i < count; ++i) {
+        direct.Add(valueAt(i));
+        indices.SetAt(i, i);
+    }
+}
+
+void setUVs(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer& layer) {
+    auto* uvs = fbxsdk::FbxLayerElementUV::Create(&target, "map1");
+    fillIndexed(*uvs, mesh.getNumberOfPolygonVertices(), [&mesh](int i) {
+        float u = 0.0f, v = 0.0f;
+        mesh.getUV(i, u, v);
+        return fbxsdk::FbxVector2(widen(u), widen(v));
+    });
+    layer.SetUVs(uvs, Element::eTextureDiffuse);
+}
+
+void setColours(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer& layer) {
+    auto* colours = fbxsdk::FbxLayerElementVertexColor::Create(&target, "");
+    fillIndexed(*colours, mesh.getNumberOfPolygonVertices(), [&mesh](int i) {
+        float red = 0.0f, green = 0.0f, blue = 0.0f, alpha = 0.0f;
+        mesh.getColour(i, red, green, blue, alpha);
+        return fbxsdk::FbxColor(widen(red), widen(green), widen(blue), widen(alpha));
+    });
+    layer.SetVertexColors(colours);
+}
+
+/// Polygons without corners are left out; the next one goes on where they stand.
+void addPolygons(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
+    int polygonVertex = 0;
+    for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon) {
+        const int size = mesh.getPolygonVertexSize(polygon);
+        if (size <= 0) {
+            continue;
+        }
+        target.BeginPolygon(/*pMaterial*/ -1, /*pTexture*/ -1, /*pGroup*/ -1, /*pLegacy*/ true);
+        for (int corner = 0; corner < size; ++corner) {
+            target.AddPolygon(mesh.getPointIndex(polygonVertex), /*pTextureUVIndex*/ -1);
+            ++polygonVertex;
+        }
+        target.EndPolygon();
+    }
+}
+
+fbxsdk::FbxLayer* firstLayer(fbxsdk::FbxMesh& mesh) {
+    if (mesh.GetLayer(0) == nullptr) {
+        mesh.CreateLayer();
+    }
+    return mesh.GetLayer(0);
+}
+
+std::nullptr_t none(const char* reason) {
+    fail(reason);
+    return nullptr;
+}
+
+} // namespace
+
+fbxsdk::FbxNode* FbxSdk::createMesh(fbxsdk::FbxManager* manager, const TnFbxMesh* mesh, const std::string& name) {
+    if (manager == nullptr || mesh == nullptr) {
+        return none("no FBX manager or no mesh to make a mesh of");
+    }
+    if (const char* fault = faultOf(*mesh)) {
+        return none(fault);
+    }
+    fbxsdk::FbxMesh* target = fbxsdk::FbxMesh::Create(manager, name.c_str());
+    if (target == nullptr) {
+        return none("a mesh cannot be made");
+    }
+    setPoints(*mesh, *target);
+    fbxsdk::FbxLayer* layer = firstLayer(*target);
+    if (layer == nullptr) {
+        return none("a mesh without a layer cannot be filled");
+    }
+    if (mesh->getValidNormals()) {
+        setNormals(*mesh, *target, *layer);
+    }
+    if (mesh->getValidUVs()) {
+        setUVs(*mesh, *target, *layer);
+    }
+    if (mesh->getValidColours()) {
+        setColours(*mesh, *target, *layer);
+    }
+    addPolygons(*mesh, *target);
+
+    fbxsdk::FbxNode* node = fbxsdk::FbxNode::Create(manager, name.c_str());
+    if (node == nullptr) {
+        return none("a node cannot be made");
+    }
+    node->SetNodeAttribute(target);
+    node->SetShadingMode(fbxsdk::FbxNode::eTextureShading);
+    succeed();
+    return node;
+}
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,132 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Nodes with a new camera, light or null, and the two objects that surfaces are made of: textures and materials.
+#include "FbxSdk.h"
+
+#include "LastError.h"
+
+namespace Tarnell::Fbx {
+
+using detail::fail;
+using detail::succeed;
+
+namespace {
+
+/// Notes why nothing is made; always null.
+std::nullptr_t none(const char* reason) {
+    fail(reason);
+    return nullptr;
+}
+
+/// A node in the container, a scene or a manager, that carries the attribute. Null when either could not be made.
+template <class Container>
+fbxsdk::FbxNode* nodeWith(fbxsdk::FbxNodeAttribute* attribute, Container* container, const std::string& name) {
+    fbxsdk::FbxNode* node = attribute != nullptr ? fbxsdk::FbxNode::Create(container, name.c_str()) : nullptr;
+    if (node == nullptr) {
+        return none("a node cannot be made");
+    }
+    node->SetNodeAttribute(attribute);
+    succeed();
+    return node;
+}
+
+} // namespace
+
+fbxsdk::FbxNode* FbxSdk::createCamera(fbxsdk::FbxScene* scene, const std::string& name) {
+    if (scene == nullptr) {
+        return none("no scene to make a camera in");
+    }
+    fbxsdk::FbxCamera* camera = fbxsdk::FbxCamera::Create(scene, name.c_str());
+    if (camera != nullptr) {
+        camera->SetApertureMode(fbxsdk::FbxCamera::eVertical);
+        camera->SetApertureWidth(0.816); // inches
+        camera->SetApertureHeight(0.612);
+        camera->SetSqueezeRatio(1.0);
+    }
+    return nodeWith(camera, scene, name);
+}
+
+fbxsdk::FbxNode* FbxSdk::createNull(fbxsdk::FbxManager* manager, const std::string& name) {
+    if (manager == nullptr) {
+        return none("no FBX manager to make a null with");
+    }
+    fbxsdk::FbxNull* null = fbxsdk::FbxNull::Create(manager, name.c_str());
+    if (null != nullptr) {
+        null->Look.Set(fbxsdk::FbxNull::sDefaultLook);
+        null->Size.Set(fbxsdk::FbxNull::sDefaultSize);
+    }
+    return nodeWith(null, manager, name);
+}
+
+fbxsdk::FbxNode* FbxSdk::createLight(fbxsdk::FbxScene* scene, TnFbxLight::EFbxLightType type, const std::string& name) {
+    if (scene == nullptr) {
+        return none("no scene to make a light in");
+    }
+    fbxsdk::FbxLight* light = fbxsdk::FbxLight::Create(scene, name.c_str());
+    if (light != nullptr) {
+        switch (type) {
+        case TnFbxLight::kFbxLightPoint:
+            light->LightType.Set(fbxsdk::FbxLight::ePoint);
+            break;
+        case TnFbxLight::kFbxLightDirectional:
+            light->LightType.Set(fbxsdk::FbxLight::eDirectional);
+            break;
+        case TnFbxLight::kFbxLightSpot:
+            light->LightType.Set(fbxsdk::FbxLight::eSpot);
+            break;
+        default: // a number that is no type: the light keeps the type it has
+            break;
+        }
+        light->CastLight.Set(true);
+    }
+    return nodeWith(light, scene, name);
+}
+
+fbxsdk::FbxFileTexture* FbxSdk::createTexture(fbxsdk::FbxScene* scene, const std::string& fileName) {
+    if (scene == nullptr) {
+        return none("no scene to make a texture in");
+    }
+    using Texture = fbxsdk::FbxFileTexture;
+    Texture* texture = Texture::Create(scene, fileName.c_str()); // kept: the file name is the object's name too
+    if (texture == nullptr) {
+        return none("a texture cannot be made");
+    }
+    texture->SetFileName(fileName.c_str());
+    texture->SetTextureUse(Texture::eStandard);
+    texture->SetMappingType(Texture::eUV);
+    texture->SetMaterialUse(Texture::eModelMaterial);
+    texture->SetSwapUV(false);
+    texture->SetTranslation(0.0, 0.0);
+    texture->SetScale(1.0, 1.0);
+    texture->SetRotation(0.0, 0.0, 0.0);
+    succeed();
+    return texture;
+}
+
+fbxsdk::FbxSurfaceLambert* FbxSdk::createLambertMaterial(fbxsdk::FbxManager* manager, const std::string& name,
+                                                         int index) {
+    if (manager == nullptr) {
+        return none("no FBX manager to make a material with");
+    }
+    const std::string numbered = name + std::to_string(index);
+    fbxsdk::FbxSurfaceLambert* material = fbxsdk::FbxSurfaceLambert::Create(manager, numbered.c_str());
+    if (material == nullptr) {
+        return none("a material cannot be made");
+    }
+    constexpr fbxsdk::FbxDouble3 kBlack(0.0, 0.0, 0.0);
+    constexpr fbxsdk::FbxDouble3 kGrey(0.5, 0.5, 0.5);
+    material->Emissive.Set(kBlack);
+    material->EmissiveFactor.Set(1.0);
+    material->Ambient.Set(kBlack);
+    material->AmbientFactor.Set(1.0);
+    material->Diffuse.Set(kGrey);
+    material->DiffuseFactor.Set(0.8);
+    material->TransparentColor.Set(kBlack);
+    material->TransparencyFactor.Set(0.0);
+    material->ShadingModel.Set("Lambert");
+    succeed();
+    return material;
+}
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,219 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Writing through the facade: what the options must name, what is left out, and what a failure leaves behind.
+#include "support/FacadeReads.h"
+#include "support/SceneBuilders.h"
+#include "support/TemporaryFolder.h"
+#include "support/WritingBuilders.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <thread>
+
+namespace Tarnell::Fbx {
+namespace {
+
+using support::TemporaryFolder;
+using test::FacadeRead;
+using test::samplesOf;
+using test::timeOf;
+using test::WrittenObjects;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::StartsWith;
+namespace fs = std::filesystem;
+
+TnFbxWriteInfo optionsFor(const std::string& fileName) {
+    TnFbxWriteInfo info;
+    info.setFileName(fileName);
+    info.setAnimationStackName("walk");
+    return info;
+}
+
+bool write(const TnFbxWriteInfo& info, const WrittenObjects& objects = {}) {
+    return Fbx().writeFile(info, objects.cameras, objects.lights, objects.transforms, objects.nulls, objects.meshes);
+}
+
+TnFbxNull keyedNull(const char* name) {
+    TnFbxNull null;
+    null.setName(name);
+    null.setTransformValueAt(TnFbxTransform::kFbxTransformPositionX, timeOf(1, 2), {1.0f, 2.0f});
+    return null;
+}
+
+TEST(FbxWriting, OfNothingStillWritesAFileWithItsStack) {
+    TemporaryFolder folder;
+
+    EXPECT_TRUE(write(optionsFor(folder.file("shot.fbx")))) << lastError();
+    EXPECT_TRUE(lastError().empty());
+
+    std::vector<std::string> stacks, nodes;
+    EXPECT_TRUE(Fbx().getAnimationStackNodeNames(folder.file("shot.fbx").c_str(), 0x4005 | 64, stacks, nodes));
+    EXPECT_THAT(stacks, ElementsAre("Take 001")) << "not the name in the options";
+    EXPECT_THAT(nodes, IsEmpty());
+}
+
+TEST(FbxWriting, NeedsAFileName) {
+    EXPECT_FALSE(write(optionsFor("")));
+    EXPECT_THAT(lastError(), HasSubstr("file"));
+}
+
+TEST(FbxWriting, NeedsAnAnimationStackName) {
+    TemporaryFolder folder;
+    TnFbxWriteInfo info = optionsFor(folder.file("out/shot.fbx"));
+    info.setAnimationStackName("");
+    const auto mesh = test::movingMesh("mesh", 1);
+    WrittenObjects objects;
+    objects.meshes = {mesh.get()};
+
+    EXPECT_FALSE(write(info, objects));
+
+    EXPECT_THAT(lastError(), HasSubstr("animation stack"));
+    EXPECT_FALSE(fs::exists(folder.file("out"))) << "nothing is made before the options are complete";
+}
+
+TEST(FbxWriting, IsTextUnlessAskedOtherwise) {
+    TemporaryFolder folder;
+    TnFbxWriteInfo info = optionsFor(folder.file("shot.fbx"));
+    EXPECT_TRUE(write(info)) << lastError();
+    EXPECT_THAT(folder.read("shot.fbx"), StartsWith("; FBX 7.5.0 project file"));
+
+    info.setFileFormat(false);
+    EXPECT_TRUE(write(info)) << lastError();
+    EXPECT_THAT(folder.read("shot.fbx"), StartsWith("Kaydara FBX Binary"));
+}
+
+TEST(FbxWriting, LeavesNullPointersOut) {
+    TemporaryFolder folder;
+    TnFbxNull null = keyedNull("null");
+    WrittenObjects objects;
+    objects.cameras = {nullptr};
+    objects.lights = {nullptr, nullptr};
+    objects.transforms = {nullptr};
+    objects.nulls = {nullptr, &null, nullptr};
+    objects.meshes = {nullptr};
+
+    EXPECT_TRUE(write(optionsFor(folder.file("shot.fbx")), objects)) << lastError();
+
+    EXPECT_THAT(FacadeRead<TnFbxTransform>(folder.file("shot.fbx")).names(), ElementsAre("null"));
+}
+
+TEST(FbxWriting, OnlyReadsTheObjects) {
+    TemporaryFolder folder;
+    TnFbxNull null = keyedNull("null");
+    WrittenObjects objects;
+    objects.nulls = {&null};
+
+    EXPECT_TRUE(write(optionsFor(folder.file("first.fbx")), objects)) << lastError();
+
+    EXPECT_EQ(null.getName(), "null");
+    EXPECT_THAT(samplesOf(null, TnFbxTransform::kFbxTransformPositionX), ElementsAre(1.0f, 2.0f));
+    EXPECT_TRUE(write(optionsFor(folder.file("second.fbx")), objects)) << lastError();
+    EXPECT_THAT(FacadeRead<TnFbxNull>(folder.file("second.fbx")).names(), ElementsAre("null"));
+}
+
+TEST(FbxWriting, ReplacesAFileThatIsThere) {
+    TemporaryFolder folder;
+    folder.write("shot.fbx", std::string(1000000, 'x'));
+
+    EXPECT_TRUE(write(optionsFor(folder.file("shot.fbx")))) << lastError();
+
+    EXPECT_EQ(FacadeRead<TnFbxNull>(folder.file("shot.fbx")).count, 0);
+}
+
+TEST(FbxWriting, SaysWhichFileCannotBeWritten) {
+    TemporaryFolder folder;
+    const std::string file = folder.file("no folder/shot.fbx");
+
+    EXPECT_FALSE(write(optionsFor(file)));
+
+    EXPECT_THAT(lastError(), StartsWith(file + ": "));
+}
+
+TEST(FbxWriting, ThatFailsLeavesTheOldFileAndTheWholePointCache) {
+    TemporaryFolder folder;
+    fs::create_directories(folder.file("shot.fbx")); // a folder in the place of the file
+    const auto mesh = test::movingMesh("mesh", 2);
+    WrittenObjects objects;
+    objects.meshes = {mesh.get()};
+    TnFbxWriteInfo info = optionsFor(folder.file("shot.fbx"));
+    info.setEndFrame(2.0f);
+
+    EXPECT_FALSE(write(info, objects));
+
+    EXPECT_THAT(lastError(), HasSubstr("shot.fbx"));
+    EXPECT_TRUE(fs::is_directory(folder.file("shot.fbx")));
+    EXPECT_TRUE(fs::exists(folder.file("shot_fpc/mesh.xml")));
+    EXPECT_TRUE(fs::exists(folder.file("shot_fpc/mesh.mcx")));
+}
+
+TEST(FbxWriting, OfAMeshWhoseSetsDoNotFitTheRangeStillWritesTheMesh) {
+    TemporaryFolder folder;
+    const auto mesh = test::movingMesh("mesh", 2);
+    WrittenObjects objects;
+    objects.meshes = {mesh.get()};
+
+    EXPECT_TRUE(write(optionsFor(folder.file("shot.fbx")), objects)) << lastError(); // frames 1 to 1
+
+    FacadeRead<TnFbxMesh> meshes(folder.file("shot.fbx"));
+    float x = 0.0f, y = 0.0f, z = -1.0f;
+    EXPECT_TRUE(meshes["mesh"].getControlPoint(2, x, y, z));
+    EXPECT_EQ(x, 2.0f);
+    EXPECT_EQ(y, 4.0f);
+    EXPECT_EQ(z, 0.0f);
+}
+
+TEST(FbxWriting, WritesALightsDirectionSoThatTheWorldGivesItBack) {
+    TemporaryFolder folder;
+    TnFbxLight light;
+    light.setName("light");
+    light.setLightType(TnFbxLight::kFbxLightDirectional);
+    light.setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderXYZ);
+    light.setTransformValue(TnFbxTransform::kFbxTransformPositionX, 1.0f);
+    light.setTransformValue(TnFbxTransform::kFbxTransformRotationX, 20.0f);
+    light.setTransformValue(TnFbxTransform::kFbxTransformRotationY, 30.0f);
+    WrittenObjects objects;
+    objects.lights = {&light};
+    EXPECT_TRUE(write(optionsFor(folder.file("shot.fbx")), objects)) << lastError();
+
+    TnFbxReadInfo info = test::localRead(folder.file("shot.fbx"));
+    info.setGlobalTransform(true);
+    FacadeRead<TnFbxLight> lights(info);
+
+    const TnFbxLight& read = lights["light"];
+    EXPECT_NEAR(read.getTransformValue(TnFbxTransform::kFbxTransformRotationX), 20.0f, 1e-4f);
+    EXPECT_NEAR(read.getTransformValue(TnFbxTransform::kFbxTransformRotationY), 30.0f, 1e-4f);
+    EXPECT_NEAR(read.getTransformValue(TnFbxTransform::kFbxTransformRotationZ), 0.0f, 1e-4f);
+}
+
+TEST(FbxWriting, RunsOnSeveralThreadsAtOnce) {
+    TemporaryFolder folder;
+    std::vector<std::thread> threads;
+    for (int i = 0; i < 4; ++i) {
+        threads.emplace_back([&folder, i] {
+            const std::string name = "null" + std::to_string(i);
+            TnFbxNull null = keyedNull(name.c_str());
+            WrittenObjects objects;
+            objects.nulls = {&null};
+            TnFbxWriteInfo info = optionsFor(folder.file(name + ".fbx"));
+            info.setFPS(i % 2 == 0 ? 24.0f : 60.0f);
+            for (int repeat = 0; repeat < 10; ++repeat) {
+                EXPECT_TRUE(write(info, objects)) << lastError();
+            }
+        });
+    }
+    for (std::thread& thread : threads) {
+        thread.join();
+    }
+    for (int i = 0; i < 4; ++i) {
+        const std::string name = "null" + std::to_string(i);
+        EXPECT_THAT(FacadeRead<TnFbxNull>(folder.file(name + ".fbx")).names(), ElementsAre(name));
+    }
+}
+
+} // namespace
+} // namespace Tarnell::Fbx
