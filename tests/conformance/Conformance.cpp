@@ -2,9 +2,12 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Reads every file of the corpus, compares it with its reference and prints a table. Fails when a row agrees less than
-// expected.json says, or when the files that differ are not those listed there.
+// expected.json says, or when the files that differ are not those listed there. With --through every file is written
+// anew first, and its copy must agree with the reference as well as the file itself does.
 #include "Corpus.h"
 #include "Expectations.h"
+#include "Rewriting.h"
+#include "RoundTrip.h"
 #include "Rows.h"
 
 #include <chrono>
@@ -20,13 +23,16 @@ constexpr int kUsage = 2;
 constexpr std::size_t kDifferencesPerFile = 1;
 constexpr std::size_t kAllDifferences = 1000;
 
-constexpr const char* kUsageText = "usage: conformance [--file NAME] [--update] [--quiet]\n"
-                                   "  --file NAME  all differences of one file\n"
-                                   "  --update     write the numbers of this run to expected.json\n"
-                                   "  --quiet      the table and the violations only\n";
+constexpr const char* kUsageText =
+    "usage: conformance [--file NAME] [--update] [--quiet] [--through VERSION:ENCODING]\n"
+    "  --file NAME  all differences of one file\n"
+    "  --update     write the numbers of this run to expected.json\n"
+    "  --quiet      the table and the violations only\n"
+    "  --through    check copies, written for example as FBX201400:binary\n";
 
 struct Options {
     std::string file;
+    std::string through;
     bool update = false;
     bool quiet = false;
 };
@@ -39,6 +45,8 @@ bool parse(int argc, char** argv, Options& options) {
             options.quiet = true;
         else if (std::strcmp(argv[i], "--file") == 0 && i + 1 < argc)
             options.file = argv[++i];
+        else if (std::strcmp(argv[i], "--through") == 0 && i + 1 < argc && parseWrittenForm(argv[i + 1]))
+            options.through = argv[++i];
         else
             return false;
     }
@@ -109,12 +117,39 @@ int judge(const Options& options, const Results& results) {
     return violations.empty() ? 0 : 1;
 }
 
+/// Checks the copies of all files against the files.
+int runThrough(const Options& options, const std::filesystem::path& corpus) {
+    const RewrittenCorpus rewritten(corpus, *parseWrittenForm(options.through));
+    RoundTrip roundTrip(TARNELL_CONFORMANCE_REWRITTEN, options.through);
+    Options silent = options;
+    silent.quiet = true;
+    for (const CorpusFile& file : listCorpus(corpus)) {
+        if (!options.file.empty() && file.name != options.file)
+            continue;
+        const std::optional<CorpusFile> copy = rewritten.rewrite(file);
+        if (!copy)
+            continue;
+        Results before, after;
+        checkFile(file, silent, before);
+        checkFile(*copy, options, after);
+        roundTrip.add(file.name, before, after);
+    }
+    roundTrip.print();
+    const std::vector<std::string> violations =
+        options.file.empty() ? roundTrip.violations() : std::vector<std::string>();
+    for (const std::string& violation : violations)
+        std::printf("FAILED %s\n", violation.c_str());
+    return violations.empty() ? 0 : 1;
+}
+
 int run(const Options& options) {
     const auto corpus = findCorpus();
     if (!corpus) {
         std::puts("corpus not found: conformance tests skipped");
         return kSkipped;
     }
+    if (!options.through.empty())
+        return runThrough(options, *corpus);
     const auto start = std::chrono::steady_clock::now();
     Results results;
     int files = 0;

@@ -25,6 +25,7 @@ constexpr Row kRows[] = {
     {"libraryMeshes", "meshes as the library hands them out", checkLibraryMeshes},
     {"libraryLocalSamples", "local transform samples of the library", checkLibraryLocalSamples},
     {"libraryPositions", "positions in the world of the library", checkLibraryPositions},
+    {"nurbsSurfaces", "NURBS surfaces: points of Wavefront files and of our meshes lie on them", checkNurbsSurfaces},
 };
 
 } // namespace

@@ -22,6 +22,10 @@ class KnownDifferences(unittest.TestCase):
         found = complaints('{"nodes": {"differing": []}}', PAGE.format("kept on purpose"))
         self.assertEqual(found, ["no file differs for this reason: kept on purpose"])
 
+    def test_knows_the_reasons_of_rewritten_files(self):
+        found = complaints(EXPECTED, PAGE.format("kept on purpose"), '[{"reason": "no layers"}]')
+        self.assertEqual(found, ["not in docs/known-differences.md: no layers"])
+
 
 if __name__ == "__main__":
     unittest.main()

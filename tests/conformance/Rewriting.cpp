@@ -1,0 +1,83 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Reads a file with the platform and writes it with the platform: what the library would not keep stays, too.
+#include "Rewriting.h"
+
+#include <fbxsdk.h>
+
+#include <cstdlib>
+#include <memory>
+#include <stdexcept>
+
+namespace conformance {
+namespace {
+
+namespace fs = std::filesystem;
+
+struct ManagerDeleter {
+    void operator()(FbxManager* manager) const { manager->Destroy(); }
+};
+
+fs::path newFolder() {
+    std::string name = (fs::temp_directory_path() / "tarnell-rewritten-XXXXXX").string();
+    if (!mkdtemp(name.data()))
+        throw std::runtime_error("no folder can be made for rewritten files");
+    return name;
+}
+
+int writerFor(FbxManager& manager, bool ascii) {
+    const FbxIOPluginRegistry& registry = *manager.GetIOPluginRegistry();
+    for (int i = 0; i < registry.GetWriterFormatCount(); ++i) {
+        if (FbxString(registry.GetWriterFormatDescription(i)).Find(ascii ? "ascii" : "binary") >= 0)
+            return i;
+    }
+    throw std::runtime_error("the registry has no such writer");
+}
+
+} // namespace
+
+std::optional<WrittenForm> parseWrittenForm(const std::string& text) {
+    const std::size_t colon = text.find(':');
+    const std::string encoding = colon == std::string::npos ? "" : text.substr(colon + 1);
+    if (encoding != "ascii" && encoding != "binary")
+        return std::nullopt;
+    return WrittenForm{text.substr(0, colon), encoding == "ascii"};
+}
+
+RewrittenCorpus::RewrittenCorpus(const fs::path& corpus, WrittenForm form)
+    : mSource(corpus / "fbx"), mFolder(newFolder()), mForm(std::move(form)) {
+    for (const fs::directory_entry& entry : fs::recursive_directory_iterator(mSource)) {
+        const fs::path target = mFolder / fs::relative(entry.path(), mSource);
+        if (entry.is_directory())
+            fs::create_directories(target);
+        else if (entry.path().extension() != ".fbx")
+            fs::create_symlink(fs::absolute(entry.path()), target);
+    }
+}
+
+RewrittenCorpus::~RewrittenCorpus() {
+    std::error_code ignored;
+    fs::remove_all(mFolder, ignored);
+}
+
+std::optional<CorpusFile> RewrittenCorpus::rewrite(const CorpusFile& file) const {
+    const std::unique_ptr<FbxManager, ManagerDeleter> manager(FbxManager::Create());
+    manager->SetIOSettings(FbxIOSettings::Create(manager.get(), IOSROOT));
+    FbxImporter* importer = FbxImporter::Create(manager.get(), "");
+    FbxScene* scene = FbxScene::Create(manager.get(), "");
+    if (!importer->Initialize(file.path.c_str()) || !importer->Import(scene))
+        return std::nullopt;
+
+    CorpusFile copy = file;
+    copy.path = mFolder / fs::relative(file.path, mSource);
+    FbxExporter* exporter = FbxExporter::Create(manager.get(), "");
+    const bool written = exporter->SetFileExportVersion(mForm.version.c_str()) &&
+                         exporter->Initialize(copy.path.c_str(), writerFor(*manager, mForm.ascii)) &&
+                         exporter->Export(scene);
+    if (!written)
+        throw std::runtime_error(file.name + " cannot be written: " + exporter->GetStatus().GetErrorString());
+    return copy;
+}
+
+} // namespace conformance

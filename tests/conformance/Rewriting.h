@@ -1,0 +1,40 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Files of the corpus, read and written anew: in another version and encoding, in a folder of their own.
+#pragma once
+
+#include "Corpus.h"
+
+#include <optional>
+#include <string>
+
+namespace conformance {
+
+/// What files are written as: "FBX201000:ascii".
+struct WrittenForm {
+    std::string version;
+    bool ascii = false;
+};
+std::optional<WrittenForm> parseWrittenForm(const std::string& text);
+
+/// Goes with all its files.
+class RewrittenCorpus {
+public:
+    /// What lies beside the files of the corpus, like point caches, is found from the new folder, too.
+    RewrittenCorpus(const std::filesystem::path& corpus, WrittenForm form);
+    ~RewrittenCorpus();
+    RewrittenCorpus(const RewrittenCorpus&) = delete;
+    RewrittenCorpus& operator=(const RewrittenCorpus&) = delete;
+
+    /// The same file, written anew; nothing when it cannot be read.
+    /// Throws std::runtime_error when it is read, but cannot be written.
+    [[nodiscard]] std::optional<CorpusFile> rewrite(const CorpusFile& file) const;
+
+private:
+    std::filesystem::path mSource;
+    std::filesystem::path mFolder;
+    WrittenForm mForm;
+};
+
+} // namespace conformance
