@@ -1,37 +1,19 @@
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
 #
-# The command-line tool as a user meets it: what it prints, where, and with which exit status.
-#   tool_test.py TOOL PROJECT_ROOT
-import json
+# The commands that look into files, as a user meets them: what they print, where, and with which exit status.
 import os
-import subprocess
 import sys
 import tempfile
 import unittest
 
-TOOL, ROOT = sys.argv[1], sys.argv[2]
-SHOT = os.path.join(ROOT, "examples", "data", "shot_010.fbx")
+from support import SHOT, dump, named, run
 
 CAMERA_CHANNELS = [
     "lookAtPositionX", "lookAtPositionY", "lookAtPositionZ", "upPositionX", "upPositionY", "upPositionZ", "roll",
     "focalLength", "apertureWidth", "apertureHeight", "nearPlane", "farPlane", "filedOfView", "filedOfViewX",
     "filedOfViewY", "filmOffsetX", "filmOffsetY"]
 TRANSFORM_CHANNELS = [kind + axis for kind in ("position", "rotation", "scale", "skew", "pivot") for axis in "XYZ"]
-
-
-def run(*arguments):
-    return subprocess.run([TOOL, *arguments], capture_output=True, text=True, timeout=120)
-
-
-def dump(*arguments):
-    result = run("dump", *arguments)
-    assert result.returncode == 0, result.stderr
-    return json.loads(result.stdout)
-
-
-def named(objects, name):
-    return next(each for each in objects if each["name"] == name)
 
 
 class Dump(unittest.TestCase):

@@ -27,10 +27,25 @@ struct DumpOptions {
     bool pretty = false;
 };
 
+enum class PointCache { maya, max, none };
+
+struct ConvertOptions {
+    std::string input, output;
+    int version = 5; ///< as TnFbxWriteInfo counts them
+    bool ascii = false;
+    std::vector<std::string> kinds;            ///< empty: all
+    std::optional<std::pair<int, int>> frames; ///< points of meshes at every whole frame, as point caches
+    std::optional<float> fps;
+    PointCache cache = PointCache::maya;
+    bool local = false;
+    bool force = false;
+};
+
 /// The names of the kinds that dump knows, in the order in which it prints them.
 const std::vector<std::string>& dumpKinds();
 
 int dump(const DumpOptions& options);
+int convert(const ConvertOptions& options);
 int info(const std::vector<std::string>& files);
 
 /// One line on standard error, as every failure of the tool prints it.

@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cstdio>
 #include <iostream>
+#include <map>
 #include <sstream>
 
 #include <CLI/CLI.hpp>
@@ -30,8 +31,7 @@ std::string parseFrames(const std::string& text, std::optional<std::pair<int, in
     return {};
 }
 
-std::vector<std::string> parseKinds(const std::string& text) {
-    const std::vector<std::string>& known = tool::dumpKinds();
+std::vector<std::string> parseKinds(const std::string& text, const std::vector<std::string>& known) {
     std::vector<std::string> kinds;
     std::istringstream list(text);
     for (std::string kind; std::getline(list, kind, ',');) {
@@ -43,24 +43,29 @@ std::vector<std::string> parseKinds(const std::string& text) {
     return kinds;
 }
 
+void addFrames(CLI::App& command, std::optional<std::pair<int, int>>& frames, const char* help) {
+    command
+        .add_option_function<std::string>(
+            "--frames",
+            [&frames](const std::string& text) {
+                const std::string complaint = parseFrames(text, frames);
+                if (!complaint.empty())
+                    throw CLI::ValidationError("--frames", complaint);
+            },
+            help)
+        ->type_name("A:B");
+}
+
 void addDump(CLI::App& app, tool::DumpOptions& options) {
     CLI::App* dump = app.add_subcommand("dump", "Print what the library reads as one JSON document");
     dump->add_option("FILE", options.file, "The FBX file")->required();
     dump->add_option_function<std::string>(
-            "--kind", [&options](const std::string& text) { options.kinds = parseKinds(text); },
+            "--kind", [&options](const std::string& text) { options.kinds = parseKinds(text, tool::dumpKinds()); },
             "Comma list of cameras, lights, markers, nulls, transforms, meshes (default: all six)")
         ->type_name("LIST");
     dump->add_flag("--local", options.local, "Local transforms instead of global ones");
     dump->add_option("--frame", options.frame, "Frame at which static values and meshes are read");
-    dump->add_option_function<std::string>(
-            "--frames",
-            [&options](const std::string& text) {
-                const std::string complaint = parseFrames(text, options.frames);
-                if (!complaint.empty())
-                    throw CLI::ValidationError("--frames", complaint);
-            },
-            "A:B, meshes are read at every whole frame of the range")
-        ->type_name("A:B");
+    addFrames(*dump, options.frames, "A:B, meshes are read at every whole frame of the range");
     dump->add_option("--sample-fps", options.sampleFps, "Sample at this many frames per second");
     dump->add_flag_callback(
         "--no-transform-points", [&options] { options.transformPoints = false; },
@@ -73,14 +78,57 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
     dump->add_flag("--pretty", options.pretty, "Indented");
 }
 
+void addConvert(CLI::App& app, tool::ConvertOptions& options) {
+    CLI::App* convert = app.add_subcommand("convert", "Write what the library reads into another FBX file");
+    convert->add_option("IN", options.input, "The FBX file to read")->required();
+    convert->add_option("OUT", options.output, "The FBX file to write")->required();
+    convert
+        ->add_option_function<std::string>(
+            "--version",
+            [&options](const std::string& text) {
+                const std::vector<std::string> years = {"2010", "2011", "2012", "2013", "2014", "2016"};
+                const auto found = std::find(years.begin(), years.end(), text);
+                if (found == years.end())
+                    throw CLI::ValidationError("--version", "no such version: " + text);
+                options.version = static_cast<int>(found - years.begin());
+            },
+            "2010, 2011, 2012, 2013, 2014 or 2016 (default)")
+        ->type_name("YEAR");
+    CLI::Option* ascii = convert->add_flag("--ascii", options.ascii, "Write an ASCII file");
+    convert
+        ->add_flag_callback(
+            "--binary", [&options] { options.ascii = false; }, "Write a binary file (default)")
+        ->excludes(ascii);
+    convert
+        ->add_option_function<std::string>(
+            "--kind",
+            [&options](const std::string& text) {
+                options.kinds = parseKinds(text, {"cameras", "lights", "nulls", "transforms", "meshes"});
+            },
+            "Comma list of cameras, lights, nulls, transforms, meshes (default: all)")
+        ->type_name("LIST");
+    addFrames(*convert, options.frames, "Points of meshes at every whole frame of A:B, as point caches");
+    convert->add_option("--fps", options.fps, "Sample and write at this many frames per second")
+        ->check(CLI::PositiveNumber);
+    const std::map<std::string, tool::PointCache> caches = {
+        {"maya", tool::PointCache::maya}, {"max", tool::PointCache::max}, {"none", tool::PointCache::none}};
+    convert->add_option("--cache", options.cache, "Form of the point caches: maya (default), max, none")
+        ->transform(CLI::CheckedTransformer(caches).description(""))
+        ->type_name("FORM");
+    convert->add_flag("--local", options.local, "Local transforms instead of global ones");
+    convert->add_flag("--force", options.force, "Overwrite what is there already");
+}
+
 } // namespace
 
 int main(int argc, char** argv) {
     std::ios::sync_with_stdio(false);
-    CLI::App app("Looks into FBX files", "tarnell-fbx");
+    CLI::App app("Looks into FBX files and writes them", "tarnell-fbx");
     app.require_subcommand(1);
     tool::DumpOptions dumpOptions;
     addDump(app, dumpOptions);
+    tool::ConvertOptions convertOptions;
+    addConvert(app, convertOptions);
     std::vector<std::string> infoFiles;
     CLI::App* info = app.add_subcommand("info", "Show on one screen what a file holds");
     info->add_option("FILE", infoFiles, "FBX files")->required();
@@ -92,5 +140,7 @@ int main(int argc, char** argv) {
         app.exit(error, std::cout, std::cerr);
         return asked ? tool::kSuccess : tool::kWrongUsage;
     }
-    return *info ? tool::info(infoFiles) : tool::dump(dumpOptions);
+    if (*info)
+        return tool::info(infoFiles);
+    return app.got_subcommand("convert") ? tool::convert(convertOptions) : tool::dump(dumpOptions);
 }

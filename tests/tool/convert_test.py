@@ -1,0 +1,247 @@
+# SPDX-License-Identifier: MIT
+# Copyright (c) Tarnell FBX contributors
+#
+# The command that writes: what arrives in the written file, and what is refused.
+import math
+import os
+import struct
+import sys
+import tempfile
+import unittest
+
+from support import ROOT, SHOT, dump, named, run
+
+MOVING = os.path.join(ROOT, "tests", "data", "tool", "moving_triangle.fbx")
+YEARS = {"2010": 6100, "2011": 7100, "2012": 7200, "2013": 7300, "2014": 7400, "2016": 7500}
+
+
+def version_of(path):
+    with open(path, "rb") as stream:
+        start = stream.read(4096)
+    if start.startswith(b"Kaydara FBX Binary"):
+        return "binary", struct.unpack_from("<I", start, 23)[0]
+    at = start.index(b"FBXVersion:")
+    return "ascii", int(start[at + 11:].split()[0])
+
+
+def samples(channel):
+    return channel["samples"] if isinstance(channel, dict) else [channel]
+
+
+def rotation(order, angles):
+    """The matrix of Euler angles in degrees, of which the first axis of the order turns first."""
+    matrix = [[float(i == j) for j in range(3)] for i in range(3)]
+    for name in order:
+        axis = "XYZ".index(name)
+        c, s = math.cos(math.radians(angles[axis])), math.sin(math.radians(angles[axis]))
+        i, j = (axis + 1) % 3, (axis + 2) % 3
+        turn = [[float(a == b) for b in range(3)] for a in range(3)]
+        turn[i][i], turn[i][j], turn[j][i], turn[j][j] = c, -s, s, c
+        matrix = [[sum(turn[a][k] * matrix[k][b] for k in range(3)) for b in range(3)] for a in range(3)]
+    return matrix
+
+
+class Convert(unittest.TestCase):
+    def setUp(self):
+        self.folder = tempfile.TemporaryDirectory()
+        self.addCleanup(self.folder.cleanup)
+        self.out = os.path.join(self.folder.name, "out.fbx")
+
+    def convert(self, *arguments, source=SHOT):
+        result = run("convert", *arguments, source, self.out)
+        self.assertEqual(result.returncode, 0, result.stderr)
+        return result
+
+    def bytes(self):
+        with open(self.out, "rb") as stream:
+            return stream.read()
+
+    def assertSameChannel(self, expected, seen, what, places=3):
+        expected, seen = samples(expected), samples(seen)
+        length = max(len(expected), len(seen))
+        expected = expected * length if len(expected) == 1 else expected
+        seen = seen * length if len(seen) == 1 else seen
+        self.assertEqual(len(expected), len(seen), what)
+        for frame, (a, b) in enumerate(zip(expected, seen)):
+            self.assertAlmostEqual(a, b, places=places, msg=f"{what} at sample {frame}")
+
+    def test_writes_each_version_in_each_encoding(self):
+        for year, version in YEARS.items():
+            for encoding in ("ascii", "binary"):
+                with self.subTest(year=year, encoding=encoding):
+                    self.convert("--force", "--version", year, "--" + encoding)
+                    self.assertEqual(version_of(self.out), (encoding, version))
+                    self.assertEqual(len(dump("--kind", "lights", self.out)["lights"]),
+                                     len(dump("--kind", "lights", SHOT)["lights"]))
+
+    def test_the_newest_binary_is_written_when_nothing_is_said(self):
+        self.convert()
+        self.assertEqual(version_of(self.out), ("binary", 7500))
+
+    def test_lens_and_film_of_a_camera_arrive_frame_by_frame(self):
+        self.convert()
+        before = named(dump("--kind", "cameras", SHOT)["cameras"], "shotCam")
+        after = named(dump("--kind", "cameras", self.out)["cameras"], "shotCam")
+        for channel in ("focalLength", "apertureWidth", "apertureHeight", "nearPlane", "farPlane", "filmOffsetX"):
+            self.assertSameChannel(before["channels"][channel], after["channels"][channel], channel)
+        lens = after["channels"]["focalLength"]
+        self.assertEqual((lens["start"], lens["end"], lens["rate"]), (1001, 1048, 24))
+
+    def test_a_camera_stands_and_looks_where_it_did(self):
+        # The camera of this file has no post-rotation and looks along its X; the written one has one. The line along
+        # which files say that a camera looks is X in both.
+        self.convert()
+        before = named(dump("--kind", "cameras", SHOT)["cameras"], "shotCam")
+        after = named(dump("--kind", "cameras", self.out)["cameras"], "shotCam")
+        for axis in "XYZ":
+            self.assertSameChannel(before["transform"]["position" + axis], after["transform"]["position" + axis],
+                                   "position" + axis)
+
+        def angles(camera, frame):
+            curves = [samples(camera["transform"]["rotation" + axis]) for axis in "XYZ"]
+            return [curve[min(frame, len(curve) - 1)] for curve in curves]
+
+        for frame in range(48):
+            old = rotation(before["rotationOrder"], angles(before, frame))
+            new = rotation(after["rotationOrder"], angles(after, frame))
+            forward_before = [row[0] for row in old]
+            forward_after = [-row[2] for row in new]  # turned by the post-rotation
+            for a, b in zip(forward_before, forward_after):
+                self.assertAlmostEqual(a, b, places=4, msg=f"sample {frame}")
+
+    def test_nulls_and_lights_arrive_frame_by_frame(self):
+        self.convert()
+        before, after = dump(SHOT), dump(self.out)
+        for kind in ("nulls", "lights"):
+            for item in before[kind]:
+                other = named(after[kind], item["name"])
+                for channel in ("position", "scale"):
+                    for axis in "XYZ":
+                        self.assertSameChannel(item["transform"][channel + axis], other["transform"][channel + axis],
+                                               f"{item['name']} {channel}{axis}")
+
+    def test_rotations_go_on_from_frame_to_frame(self):
+        self.convert()
+        for item in dump("--kind", "nulls,lights", "--local", self.out)["nulls"]:
+            for axis in "XYZ":
+                values = samples(item["transform"]["rotation" + axis])
+                for a, b in zip(values, values[1:]):
+                    self.assertLess(abs(a - b), 90, item["name"])
+
+    def test_a_mesh_stands_where_it_did(self):
+        self.convert()
+        before = dump("--kind", "meshes", "--frame", "1001", SHOT)["meshes"]
+        after = dump("--kind", "meshes", self.out)["meshes"]
+        self.assertEqual([mesh["name"] for mesh in before], [mesh["name"] for mesh in after])
+        for a, b in zip(before, after):
+            self.assertEqual(a["polygonVertexSizes"], b["polygonVertexSizes"])
+            self.assertEqual(a["pointIndices"], b["pointIndices"])
+            self.assertEqual(len(a["controlPoints"]), len(b["controlPoints"]))
+            for u, v in zip(a["controlPoints"], b["controlPoints"]):
+                self.assertAlmostEqual(u, v, places=3)
+
+    def points(self, path):
+        meshes = dump("--kind", "meshes", "--frames", "1003:1006", path)["meshes"]
+        return [(mesh["name"], mesh["frame"], [round(c, 3) for c in mesh["controlPoints"]]) for mesh in meshes]
+
+    def test_moving_points_become_a_cache_that_reads_back(self):
+        self.convert("--frames", "1003:1006", source=MOVING)
+        self.assertEqual(sorted(os.listdir(self.out[:-4] + "_fpc")), ["moving.mcx", "moving.xml"])
+        expected = [("moving", frame, [4 + 2 * i, 0, 0, 5 + 2 * i, 0, 0, 4 + 2 * i, 1, 0])
+                    for i, frame in enumerate(range(1003, 1007))]
+        self.assertEqual(self.points(MOVING), expected)
+        self.assertEqual(self.points(self.out), expected)
+
+    def test_moving_points_become_a_max_cache(self):
+        self.convert("--frames", "1003:1006", "--cache", "max", source=MOVING)
+        with open(os.path.join(self.out[:-4] + "_fpc", "moving.pc2"), "rb") as stream:
+            self.assertEqual(stream.read(12), b"POINTCACHE2\0")
+            _, points, start, rate, samples_ = struct.unpack("<iiffi", stream.read(20))
+        self.assertEqual((points, start, samples_), (3, 1003, 4))
+
+    def test_without_caches_points_stand_as_at_the_first_frame(self):
+        self.convert("--frames", "1003:1006", "--cache", "none", source=MOVING)
+        self.assertFalse(os.path.exists(self.out[:-4] + "_fpc"))
+        self.assertEqual([points for _, _, points in self.points(self.out)], [[4, 0, 0, 5, 0, 0, 4, 1, 0]] * 4)
+
+    def test_frames_are_counted_at_the_new_rate(self):
+        self.convert("--frames", "2004:2008", "--fps", "48", source=MOVING)
+        meshes = dump("--kind", "meshes", "--frames", "2004:2008", self.out)["meshes"]
+        self.assertEqual([round(mesh["controlPoints"][0], 3) for mesh in meshes], [2, 3, 4, 5, 6])
+
+    def test_only_the_kinds_that_were_asked_for_are_written(self):
+        self.convert("--kind", "cameras")
+        page = dump(self.out)
+        self.assertEqual([page[kind] for kind in ("lights", "nulls", "meshes")], [[], [], []])
+        self.assertIsNotNone(named(page["cameras"], "shotCam"))
+
+    def test_another_rate_samples_anew(self):
+        self.convert("--fps", "48")
+        lens = named(dump("--kind", "cameras", self.out)["cameras"], "shotCam")["channels"]["focalLength"]
+        self.assertEqual((lens["start"], lens["end"], lens["rate"]), (2002, 2096, 48))
+        old = samples(named(dump("--kind", "cameras", SHOT)["cameras"], "shotCam")["channels"]["focalLength"])
+        self.assertSameChannel({"samples": old}, {"samples": lens["samples"][::2]}, "every other frame is an old one")
+        self.assertAlmostEqual(lens["samples"][1], (old[0] + old[1]) / 2, places=4)
+
+    def test_what_is_lost_is_said(self):
+        self.assertIn("moving meshes: 1\n", self.convert(source=MOVING).stderr)
+        self.assertEqual(self.convert("--force", "--frames", "1001:1011", source=MOVING).stderr, "")
+        self.assertIn("look-at points, up vectors and rolls of cameras: 1\n", self.convert("--force").stderr)
+
+    def test_a_copy_of_a_copy_is_the_same(self):
+        self.convert()
+        first = self.out
+        self.out = os.path.join(self.folder.name, "again.fbx")
+        self.convert(source=first)
+        before, after = dump(first), dump(self.out)
+        self.assertEqual(before["range"], after["range"])
+        for kind in ("cameras", "lights", "nulls", "transforms"):
+            self.assertEqual([item["name"] for item in before[kind]], [item["name"] for item in after[kind]])
+            for a, b in zip(before[kind], after[kind]):
+                for name, channel in a["transform"].items():
+                    self.assertSameChannel(channel, b["transform"][name], f"{a['name']} {name}")
+
+    def test_nothing_is_overwritten_unless_forced(self):
+        with open(self.out, "w", encoding="utf-8") as stream:
+            stream.write("precious")
+        result = run("convert", SHOT, self.out)
+        self.assertEqual(result.returncode, 2)
+        self.assertIn("--force", result.stderr)
+        with open(self.out, encoding="utf-8") as stream:
+            self.assertEqual(stream.read(), "precious")
+        self.convert("--force")
+        self.assertEqual(version_of(self.out), ("binary", 7500))
+
+    def test_caches_are_not_overwritten_unless_forced(self):
+        os.mkdir(self.out[:-4] + "_fpc")
+        result = run("convert", "--frames", "1001:1002", SHOT, self.out)
+        self.assertEqual(result.returncode, 2)
+        self.assertIn("_fpc", result.stderr)
+        self.assertFalse(os.path.exists(self.out))
+
+    def test_the_input_is_never_overwritten(self):
+        self.convert()
+        link = os.path.join(self.folder.name, "link.fbx")
+        os.symlink(self.out, link)
+        before = self.bytes()
+        for target in (self.out, link, os.path.join(self.folder.name, ".", "out.fbx")):
+            result = run("convert", "--force", self.out, target)
+            self.assertEqual(result.returncode, 2)
+            self.assertEqual(self.bytes(), before)
+
+    def test_what_cannot_be_read_or_written_gives_one_line_and_status_1(self):
+        for source, target in (("missing.fbx", self.out), (SHOT, os.path.join(self.folder.name, "no", "out.fbx"))):
+            result = run("convert", source, target)
+            self.assertEqual(result.returncode, 1)
+            self.assertRegex(result.stderr.splitlines()[-1], r"^tarnell-fbx: .*(missing\.fbx|out\.fbx)")
+        self.assertEqual(os.listdir(self.folder.name), [])
+
+    def test_wrong_usage_gives_status_2(self):
+        for arguments in (["--version", "2015"], ["--ascii", "--binary"], ["--kind", "markers"], ["--frames", "9:1"],
+                          ["--fps", "0"], ["--cache", "alembic"], ["--fps", "-24"]):
+            result = run("convert", *arguments, SHOT, self.out)
+            self.assertEqual(result.returncode, 2, arguments)
+        self.assertFalse(os.path.exists(self.out))
+
+
+unittest.main(argv=sys.argv[:1], verbosity=0)

@@ -1,0 +1,393 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// tarnell-fbx convert: what the library reads from one file, written into another.
+#include <algorithm>
+#include <filesystem>
+#include <iostream>
+#include <map>
+#include <memory>
+#include <set>
+#include <type_traits>
+
+#include <unistd.h>
+
+#include "Commands.h"
+#include "Placement.h"
+#include "Resampling.h"
+
+#include "Fbx.h"
+#include "FbxSdk.h"
+#include "TnFbxCamera.h"
+#include "TnFbxError.h"
+#include "TnFbxLight.h"
+#include "TnFbxMarker.h"
+#include "TnFbxMesh.h"
+#include "TnFbxNull.h"
+#include "TnFbxReadInfo.h"
+#include "TnFbxWriteInfo.h"
+
+namespace tool {
+namespace {
+
+using namespace Tarnell::Fbx;
+namespace filesystem = std::filesystem;
+
+/// A line that is overwritten while work goes on; nothing when standard error is a file.
+class Progress {
+public:
+    Progress() : mShown(isatty(STDERR_FILENO) == 1) {}
+    ~Progress() { clear(); }
+    Progress(const Progress&) = delete;
+    Progress& operator=(const Progress&) = delete;
+
+    void say(const std::string& text) {
+        if (!mShown)
+            return;
+        clear();
+        std::cerr << text << std::flush;
+        mLength = text.size();
+    }
+
+private:
+    void clear() {
+        if (mLength > 0)
+            std::cerr << '\r' << std::string(mLength, ' ') << '\r' << std::flush;
+        mLength = 0;
+    }
+
+    bool mShown;
+    std::size_t mLength = 0;
+};
+
+/// The objects of one kind, and the pointers by which the facade writes them.
+template <class Object>
+struct Objects {
+    std::unique_ptr<Object[]> array;
+    std::vector<Object*> chosen;
+};
+
+class Convert {
+public:
+    explicit Convert(const ConvertOptions& options) : mOptions(options) {
+        mInfo.setFileName(options.input);
+        mInfo.setAnimationStackName("Take 001"); // any name will do; the first stack is read
+        mInfo.setGlobalTransform(!options.local);
+    }
+
+    /// False with the reason in lastError().
+    bool load() {
+        if (!mSdk.initFbxSdkManager() || !mFbx.loadScene(mOptions.input, mSdk))
+            return false;
+        mSdk.getGlobalAnimationStackTime(mTime, 0.0F, /*useSampleFPS=*/false, 0.0F);
+        if (mOptions.fps)
+            mTime = rangeAt(mTime, *mOptions.fps);
+        mInfo.setFrame(static_cast<float>(firstFrame()));
+        return true;
+    }
+
+    bool read() {
+        mProgress.say("reading " + mOptions.input);
+        return (!wants("cameras") || readCameras()) &&
+               (!wants("lights") || collect(mLights, &FbxSdk::getNumberOfLights, 64, &FbxSdk::getLights)) &&
+               (!wants("nulls") || collect(mNulls, &FbxSdk::getNumberOfNulls, 0x4000, &FbxSdk::getNulls)) &&
+               (!wants("meshes") || readMeshes()) && (!wants("transforms") || readTransforms()) && readMarkers();
+    }
+
+    bool write() {
+        mProgress.say("writing " + mOptions.output);
+        TnFbxWriteInfo info;
+        info.setFileName(mOptions.output);
+        info.setAnimationStackName("Take 001");
+        info.setFileFormat(mOptions.ascii);
+        info.setCompatibilityVersion(static_cast<TnFbxWriteInfo::eCompatibilityVersion>(mOptions.version));
+        info.setFPS(mTime.getFrameRate());
+        info.setAnimateMeshVertices(cachesPoints());
+        info.setMayaVertexCacheFormat(mOptions.cache == PointCache::maya);
+        info.setStartFrame(static_cast<float>(firstFrame()));
+        info.setEndFrame(static_cast<float>(lastFrame()));
+        return mFbx.writeFile(info, mCameras.chosen, mLights.chosen, mTransforms.chosen, mNulls.chosen, mMeshes.chosen);
+    }
+
+    /// Why reading failed.
+    [[nodiscard]] const std::string& complaint() const { return mComplaint.empty() ? lastError() : mComplaint; }
+
+    /// What was read, or could have been, and is not in the written file.
+    [[nodiscard]] const std::vector<std::string>& losses() const { return mLosses; }
+
+private:
+    [[nodiscard]] bool wants(const char* kind) const {
+        const auto& kinds = mOptions.kinds;
+        return kinds.empty() || std::find(kinds.begin(), kinds.end(), kind) != kinds.end();
+    }
+
+    [[nodiscard]] bool cachesPoints() const { return mOptions.frames && mOptions.cache != PointCache::none; }
+    [[nodiscard]] int firstFrame() const { return mOptions.frames ? mOptions.frames->first : mTime.getStartFrame(); }
+    [[nodiscard]] int lastFrame() const { return cachesPoints() ? mOptions.frames->second : firstFrame(); }
+
+    void lose(int count, const char* what) {
+        if (count > 0)
+            mLosses.push_back(std::string(what) + ": " + std::to_string(count));
+    }
+
+    template <class Object>
+    bool readAll(std::unique_ptr<Object[]>& array, int& number, int (FbxSdk::*count)() const, int mask,
+                 bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int)) {
+        number = mFbx.getNumberOfObjects((mSdk.*count)(), true, mask, "", mSdk);
+        if (number < 1)
+            return true;
+        array.reset(new Object[static_cast<std::size_t>(number)]);
+        return (mSdk.*fill)(mInfo, array.get(), number);
+    }
+
+    template <class Object>
+    bool collect(Objects<Object>& objects, int (FbxSdk::*count)() const, int mask,
+                 bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int)) {
+        int number = 0;
+        if (!readAll(objects.array, number, count, mask, fill))
+            return false;
+        int turned = 0;
+        for (int i = 0; i < number; ++i) {
+            Object& object = objects.array[static_cast<std::size_t>(i)];
+            objects.chosen.push_back(&object);
+            turned += hasSkewOrPivot(object) ? 1 : 0;
+            if (!mOptions.local && !std::is_same_v<Object, TnFbxCamera>)
+                expressInXyz(object);
+            if (mOptions.fps)
+                resampleAll(object);
+        }
+        lose(turned, "not written: skews and pivots of objects");
+        return true;
+    }
+
+    /// The library's own sampling at another rate takes properties at the old times, so it is not used for channels.
+    void resampleAll(TnFbxTransform& object) const {
+        for (int i = 0; i <= TnFbxTransform::kFbxTransformPivotZ; ++i)
+            resample(*object.getTransformChannel(static_cast<TnFbxTransform::EFbxTransformChannelType>(i)),
+                     *mOptions.fps);
+    }
+    void resampleAll(TnFbxCamera& camera) const {
+        resampleAll(static_cast<TnFbxTransform&>(camera));
+        for (int i = 0; i <= TnFbxCamera::kFbxCameraFilmOffsetY; ++i)
+            resample(*camera.getCameraChannel(static_cast<TnFbxCamera::EFbxCameraChannelType>(i)), *mOptions.fps);
+    }
+    void resampleAll(TnFbxLight& light) const {
+        resampleAll(static_cast<TnFbxTransform&>(light));
+        for (int i = 0; i <= TnFbxLight::kFbxLightConeAngle; ++i)
+            resample(*light.getLightChannel(static_cast<TnFbxLight::EFbxLightChannelType>(i)), *mOptions.fps);
+    }
+
+    static bool hasSkewOrPivot(const TnFbxTransform& object) {
+        for (int i = TnFbxTransform::kFbxTransformSkewX; i <= TnFbxTransform::kFbxTransformPivotZ; ++i) {
+            const auto channel = static_cast<TnFbxTransform::EFbxTransformChannelType>(i);
+            if (object.getTransformAnimated(channel) || object.getTransformValue(channel) != 0.0F)
+                return true;
+        }
+        return false;
+    }
+
+    /// Every file gets producer cameras when it is written; those that were read are not written as cameras.
+    bool readCameras() {
+        if (!collect(mCameras, &FbxSdk::getNumberOfCameras, 32, &FbxSdk::getCameras))
+            return false;
+        const auto isView = [](const TnFbxCamera* camera) { return camera->getName().rfind("Producer ", 0) == 0; };
+        auto& chosen = mCameras.chosen;
+        chosen.erase(std::remove_if(chosen.begin(), chosen.end(), isView), chosen.end());
+        if (!mOptions.local)
+            placeCameras();
+        const auto interested =
+            std::count_if(chosen.begin(), chosen.end(), [](const TnFbxCamera* camera) { return hasInterest(*camera); });
+        lose(static_cast<int>(interested), "not written: look-at points, up vectors and rolls of cameras");
+        return true;
+    }
+
+    /// A camera that follows a target keeps the rotation that the library computes from it.
+    void placeCameras() {
+        std::multimap<std::string, FbxNode*> nodes;
+        collectCameraNodes(*mSdk.getScene()->GetRootNode(), nodes);
+        for (TnFbxCamera* camera : mCameras.chosen) {
+            const auto found = nodes.find(camera->getName());
+            if (found == nodes.end())
+                continue;
+            if (!found->second->GetTarget())
+                placeCamera(*camera, *found->second, mTime);
+            nodes.erase(found);
+        }
+    }
+
+    /// In the order in which the library reads them.
+    static void collectCameraNodes(FbxNode& parent, std::multimap<std::string, FbxNode*>& nodes) {
+        for (int i = 0; i < parent.GetChildCount(); ++i) {
+            FbxNode& child = *parent.GetChild(i);
+            if (child.GetCamera())
+                nodes.emplace(child.GetName(), &child);
+            collectCameraNodes(child, nodes);
+        }
+    }
+
+    static bool hasInterest(const TnFbxCamera& camera) {
+        constexpr float kDefaults[] = {TnFbxCamera::kDefaultCameraLookAtPositionX,
+                                       TnFbxCamera::kDefaultCameraLookAtPositionY,
+                                       TnFbxCamera::kDefaultCameraLookAtPositionZ,
+                                       TnFbxCamera::kDefaultCameraUpX,
+                                       TnFbxCamera::kDefaultCameraUpY,
+                                       TnFbxCamera::kDefaultCameraUpZ,
+                                       TnFbxCamera::kDefaultCameraRoll};
+        for (int i = TnFbxCamera::kFbxCameraLookAtPositionX; i <= TnFbxCamera::kFbxCameraRoll; ++i) {
+            const auto channel = static_cast<TnFbxCamera::EFbxCameraChannelType>(i);
+            if (camera.getAnimated(channel) || camera.getValue(channel) != kDefaults[i])
+                return true;
+        }
+        return false;
+    }
+
+    /// Meshes at the first frame, with a set of points for each further one.
+    bool readMeshes() {
+        mInfo.setUseSampleFPS(mOptions.fps.has_value());
+        mInfo.setSampleFPS(mTime.getFrameRate());
+        if (!collect(mMeshes, &FbxSdk::getNumberOfMeshes, 4, &FbxSdk::getMeshes))
+            return false;
+        for (long long frame = firstFrame() + 1LL; frame <= lastFrame(); ++frame) {
+            mProgress.say("reading meshes, frame " + std::to_string(frame) + " of " + std::to_string(lastFrame()));
+            mInfo.setFrame(static_cast<float>(frame));
+            if (!addPoints())
+                return false;
+        }
+        mInfo.setFrame(static_cast<float>(firstFrame()));
+        mInfo.setUseSampleFPS(false);
+        if (!cachesPoints())
+            loseMotion();
+        return true;
+    }
+
+    bool addPoints() {
+        std::unique_ptr<TnFbxMesh[]> meshes;
+        int number = 0;
+        if (!readAll(meshes, number, &FbxSdk::getNumberOfMeshes, 4, &FbxSdk::getMeshes))
+            return false;
+        for (int i = 0; i < number && i < static_cast<int>(mMeshes.chosen.size()); ++i) {
+            TnFbxMesh& target = *mMeshes.chosen[static_cast<std::size_t>(i)];
+            const TnFbxMesh& source = meshes[static_cast<std::size_t>(i)];
+            const int points = source.getNumberOfControlPoints();
+            if (points != target.getNumberOfControlPoints()) {
+                mComplaint = target.getName() + " has another number of points at frame " +
+                             std::to_string(static_cast<int>(mInfo.getFrame())) +
+                             ", which no point cache can hold (see --cache none)";
+                return false;
+            }
+            target.addControlPointSet();
+            float x = 0.0F, y = 0.0F, z = 0.0F;
+            for (int k = 0; k < points; ++k) {
+                source.getControlPoint(k, x, y, z);
+                target.addControlPoint(x, y, z);
+            }
+        }
+        return true;
+    }
+
+    void loseMotion() {
+        const auto moving = std::count_if(mMeshes.chosen.begin(), mMeshes.chosen.end(),
+                                          [](const TnFbxMesh* mesh) { return moves(*mesh); });
+        lose(static_cast<int>(moving), "written as they stand at the first frame (see --frames): moving meshes");
+    }
+
+    static bool moves(const TnFbxMesh& mesh) {
+        for (int i = 0; i <= TnFbxTransform::kFbxTransformScaleZ; ++i) {
+            const auto channel = static_cast<TnFbxTransform::EFbxTransformChannelType>(i);
+            const TnFbxTime time = mesh.getTransformTime(channel);
+            if (!mesh.getTransformAnimated(channel))
+                continue;
+            for (long long frame = time.getStartFrame(); frame <= time.getEndFrame(); ++frame)
+                if (mesh.getTransformValueAt(channel, static_cast<float>(frame)) != mesh.getTransformValue(channel))
+                    return true;
+        }
+        return false;
+    }
+
+    /// Of all transforms those that are no nulls or meshes which are written already.
+    bool readTransforms() {
+        if (!collect(mTransforms, &FbxSdk::getNumberOfTransforms, 0x4005, &FbxSdk::getTransforms))
+            return false;
+        std::multiset<std::string> written;
+        for (const TnFbxNull* null : mNulls.chosen)
+            written.insert(null->getName());
+        for (const TnFbxMesh* mesh : mMeshes.chosen)
+            written.insert(mesh->getName());
+        auto& chosen = mTransforms.chosen;
+        const auto known = [&written](const TnFbxTransform* transform) {
+            const auto found = written.find(transform->getName());
+            if (found == written.end())
+                return false;
+            written.erase(found);
+            return true;
+        };
+        chosen.erase(std::remove_if(chosen.begin(), chosen.end(), known), chosen.end());
+        return true;
+    }
+
+    bool readMarkers() {
+        const int markers = mFbx.getNumberOfObjects(mSdk.getNumberOfMarkers(), true, 1, "", mSdk);
+        lose(markers,
+             wants("transforms") ? "written as nulls, without look, size and colour: markers" : "not written: markers");
+        return true;
+    }
+
+    const ConvertOptions& mOptions;
+    TnFbxReadInfo mInfo;
+    TnFbxTime mTime;
+    Tarnell::Fbx::Fbx mFbx;
+    FbxSdk mSdk;
+    Progress mProgress;
+    Objects<TnFbxCamera> mCameras;
+    Objects<TnFbxLight> mLights;
+    Objects<TnFbxNull> mNulls;
+    Objects<TnFbxTransform> mTransforms;
+    Objects<TnFbxMesh> mMeshes;
+    std::vector<std::string> mLosses;
+    std::string mComplaint;
+};
+
+/// Where the library puts the point caches of a file.
+filesystem::path cacheFolder(const filesystem::path& file) {
+    return file.parent_path() / (file.stem().string() + "_fpc");
+}
+
+/// Why the output may not be written; empty when it may.
+std::string refusal(const ConvertOptions& options) {
+    std::error_code ignored;
+    if (filesystem::equivalent(options.input, options.output, ignored))
+        return "is the file that is read";
+    if (options.force)
+        return {};
+    if (filesystem::exists(options.output, ignored))
+        return "exists; --force overwrites it";
+    const filesystem::path caches = cacheFolder(options.output);
+    if (options.frames && options.cache != PointCache::none && filesystem::exists(caches, ignored))
+        return "its point caches exist in " + caches.string() + "; --force overwrites them";
+    return {};
+}
+
+} // namespace
+
+int convert(const ConvertOptions& options) {
+    const std::string refused = refusal(options);
+    if (!refused.empty()) {
+        printError(options.output, refused);
+        return kWrongUsage;
+    }
+    Convert conversion(options);
+    if (!conversion.load() || !conversion.read()) {
+        printError(options.input, conversion.complaint());
+        return kUnreadable;
+    }
+    const bool written = conversion.write();
+    for (const std::string& loss : conversion.losses())
+        std::cerr << "tarnell-fbx: " << options.input << ": " << loss << '\n';
+    if (!written) {
+        printError(options.output, lastError());
+        return kUnreadable;
+    }
+    return kSuccess;
+}
+
+} // namespace tool

@@ -1,0 +1,118 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Where converted objects stand and how they are turned.
+#include "Placement.h"
+
+#include <array>
+#include <cmath>
+#include <vector>
+
+namespace tool {
+namespace {
+
+using namespace Tarnell::Fbx;
+using Channel = TnFbxTransform::EFbxTransformChannelType;
+
+/// x, y and z, each with a value per frame.
+using Curves = std::array<std::vector<float>, 3>;
+
+void append(Curves& curves, const FbxVector4& value) {
+    for (int axis = 0; axis < 3; ++axis)
+        curves[static_cast<std::size_t>(axis)].push_back(static_cast<float>(value[axis]));
+}
+
+void store(TnFbxTransform& object, Channel first, const TnFbxTime& range, const Curves& curves) {
+    for (int axis = 0; axis < 3; ++axis) {
+        const auto channel = static_cast<Channel>(first + axis);
+        const std::vector<float>& values = curves[static_cast<std::size_t>(axis)];
+        object.setTransformValueAt(channel, range, values);
+        object.setTransformValue(channel, values.front());
+    }
+}
+
+/// The angle plus full turns that is nearest to the other one.
+double nearestTurn(double angle, double other) { return angle + 360.0 * std::round((other - angle) / 360.0); }
+
+/// Of all XYZ angles that turn alike, those nearest to the ones before.
+FbxVector4 continued(const FbxVector4& angles, const FbxVector4& before) {
+    const FbxVector4 other(angles[0] + 180.0, 180.0 - angles[1], angles[2] + 180.0);
+    FbxVector4 best;
+    double least = HUGE_VAL;
+    for (const FbxVector4& candidate : {angles, other}) {
+        FbxVector4 turned;
+        double distance = 0.0;
+        for (int i = 0; i < 3; ++i) {
+            turned[i] = nearestTurn(candidate[i], before[i]);
+            distance += std::abs(turned[i] - before[i]);
+        }
+        if (distance < least) {
+            least = distance;
+            best = turned;
+        }
+    }
+    return best;
+}
+
+FbxAMatrix turned(const FbxVector4& angles) {
+    FbxAMatrix matrix;
+    matrix.SetR(angles);
+    return matrix;
+}
+
+/// The library decomposes into XYZ, but into ZXY where an object is exactly at the origin.
+FbxAMatrix rotationAt(const TnFbxTransform& object, float frame) {
+    const auto value = [&](int channel) {
+        return static_cast<double>(object.getTransformValueAt(static_cast<Channel>(channel), frame));
+    };
+    const double x = value(TnFbxTransform::kFbxTransformRotationX), y = value(TnFbxTransform::kFbxTransformRotationY),
+                 z = value(TnFbxTransform::kFbxTransformRotationZ);
+    const bool atOrigin = value(TnFbxTransform::kFbxTransformPositionX) == 0.0 &&
+                          value(TnFbxTransform::kFbxTransformPositionY) == 0.0 &&
+                          value(TnFbxTransform::kFbxTransformPositionZ) == 0.0;
+    if (!atOrigin)
+        return turned({x, y, z});
+    return turned({0, y, 0}) * turned({x, 0, 0}) * turned({0, 0, z});
+}
+
+} // namespace
+
+void placeCamera(TnFbxCamera& camera, FbxNode& node, const TnFbxTime& range) {
+    // What is written is turned by a further quarter, so that the view axis of hosts becomes that of files.
+    const FbxAMatrix quarter = turned({0, -90, 0});
+    Curves positions, rotations;
+    FbxVector4 angles;
+    for (long long frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
+        FbxTime time;
+        time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(range.getFrameRate()));
+        const FbxAMatrix& world = node.EvaluateGlobalTransform(time);
+        append(positions, world.GetT());
+        FbxAMatrix rotation;
+        rotation.SetQ(world.GetQ());
+        const FbxVector4 now = (rotation * quarter).GetR();
+        angles = rotations[0].empty() ? now : continued(now, angles);
+        append(rotations, angles);
+    }
+    if (rotations[0].empty())
+        return;
+    store(camera, Channel::kFbxTransformPositionX, range, positions);
+    store(camera, Channel::kFbxTransformRotationX, range, rotations);
+    camera.setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderXYZ);
+}
+
+void expressInXyz(TnFbxTransform& object) {
+    const TnFbxTime range = object.getTransformTime(TnFbxTransform::kFbxTransformRotationX);
+    if (!object.getTransformAnimated(TnFbxTransform::kFbxTransformRotationX))
+        return;
+    Curves rotations;
+    FbxVector4 angles;
+    for (long long frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
+        const FbxVector4 now = rotationAt(object, static_cast<float>(frame)).GetR();
+        angles = rotations[0].empty() ? now : continued(now, angles);
+        append(rotations, angles);
+    }
+    store(object, Channel::kFbxTransformRotationX, range, rotations);
+    object.setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderXYZ);
+}
+
+} // namespace tool
