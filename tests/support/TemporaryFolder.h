@@ -4,12 +4,14 @@
 // A folder of its own for a test that needs files, gone when the test ends.
 #pragma once
 
+#include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
 #include <stdexcept>
 #include <string>
+#include <vector>
 
 namespace support {
 
@@ -41,6 +43,15 @@ public:
     [[nodiscard]] std::string read(const std::string& name) const {
         std::ifstream in(mPath / name, std::ios::binary);
         return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+    }
+
+    /// The names in the folder, in order.
+    [[nodiscard]] std::vector<std::string> files(const std::string& subfolder = ".") const {
+        std::vector<std::string> names;
+        for (const auto& entry : std::filesystem::directory_iterator(mPath / subfolder))
+            names.push_back(entry.path().filename().string());
+        std::sort(names.begin(), names.end());
+        return names;
     }
 
 private:

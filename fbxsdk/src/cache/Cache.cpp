@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <utility>
 
 #include <fbxsdk/FbxPathUtils.h>
 #include <fbxsdk/FbxScene.h>
@@ -45,7 +46,7 @@ public:
 
 namespace {
 
-/// A status that is always there, copied to the caller's at the end when it wants one.
+/// A status that is always there, handed to the caller at the end when it wants one.
 class Outcome {
 public:
     explicit Outcome(FbxStatus* target) : mTarget(target) {}
@@ -53,7 +54,7 @@ public:
     Outcome& operator=(const Outcome&) = delete;
     ~Outcome() {
         if (mTarget)
-            *mTarget = status;
+            *mTarget = std::move(status);
     }
     bool fail(FbxStatus::EStatusCode code, const char* sentence) {
         status.SetCode(code, "%s", sentence);
@@ -78,6 +79,13 @@ constexpr DataTypeName kDataTypes[] = {{FbxCache::eDoubleArray, "DoubleArray"},
 int roundedTicks(double perSecond) {
     const double ticks = perSecond > 0.0 ? std::round(kMayaTicksPerSecond / perSecond) : 0.0;
     return ticks >= 1.0 && ticks <= 1e9 ? static_cast<int>(ticks) : 1;
+}
+
+/// Where a cache is written: not searched for, unlike where it is read.
+std::string writtenName(const FbxCache& cache) {
+    FbxString relative, absolute;
+    cache.GetCacheFileName(relative, absolute);
+    return (absolute.IsEmpty() ? relative : absolute).Buffer();
 }
 
 const char* const kNotOpen = "the cache is not open";
@@ -249,10 +257,7 @@ bool FbxCache::OpenFileForWrite(EMCFileCount pFileCount, double pSamplingFrameRa
     description.wide = pBinaryFormat == eMCX;
     description.ticksPerFrame = detail::roundedTicks(pSamplingFrameRate);
     auto file = std::make_unique<detail::CacheFile>();
-    FbxString relative, absolute;
-    GetCacheFileName(relative, absolute);
-    const FbxString& name = absolute.IsEmpty() ? relative : absolute;
-    file->mayaWriter = detail::MayaCacheWriter::open(name.Buffer(), description, outcome.status);
+    file->mayaWriter = detail::MayaCacheWriter::open(detail::writtenName(*this), description, outcome.status);
     if (!file->mayaWriter)
         return false;
     mFile = std::move(file);
@@ -319,8 +324,8 @@ bool FbxCache::Write(int pChannelIndex, FbxTime& pTime, double* pBuffer, unsigne
     if (pChannelIndex < 0 || !pBuffer)
         return outcome.fail(FbxStatus::eInvalidParameter, "no channel or no buffer");
     const std::span<const double> points(pBuffer, std::size_t{pPointCount} * 3);
-    return mFile->mayaWriter->write(static_cast<std::size_t>(pChannelIndex), pTime.GetSecondDouble(), points) ||
-           outcome.fail(FbxStatus::eFailure, "the sample could not be written");
+    return mFile->mayaWriter->write(static_cast<std::size_t>(pChannelIndex), pTime.GetSecondDouble(), points,
+                                    outcome.status);
 }
 
 bool FbxCache::Write(int pChannelIndex, FbxTime& pTime, float* pBuffer, unsigned int pPointCount, FbxStatus* pStatus) {
@@ -356,11 +361,8 @@ bool FbxCache::OpenFileForWrite(double pFrameStartOffset, double, unsigned int p
     }
     // The header's rate is frames per sample, whatever the frames per second are: one sample for every frame.
     const detail::PointCacheHeader header{pPointCount, pFrameStartOffset, 1.0, pSampleCount};
-    FbxString relative, absolute;
-    GetCacheFileName(relative, absolute);
-    const FbxString& name = absolute.IsEmpty() ? relative : absolute;
     auto file = std::make_unique<detail::CacheFile>();
-    file->pointWriter = detail::PointCacheWriter::open(name.Buffer(), header, outcome.status);
+    file->pointWriter = detail::PointCacheWriter::open(detail::writtenName(*this), header, outcome.status);
     if (!file->pointWriter)
         return false;
     mFile = std::move(file);
@@ -408,8 +410,7 @@ bool FbxCache::Write(unsigned int pFrameIndex, double* pBuffer, FbxStatus* pStat
         return outcome.fail(FbxStatus::eFailure, detail::kNotMax);
     // A frame before zero arrives wrapped around.
     const auto frame = static_cast<double>(static_cast<std::int32_t>(pFrameIndex));
-    return mFile->pointWriter->write(frame, pBuffer) ||
-           outcome.fail(FbxStatus::eIndexOutOfRange, "a frame outside the cache's samples");
+    return mFile->pointWriter->write(frame, pBuffer, outcome.status);
 }
 
 FBXSDK_NAMESPACE_END

@@ -10,6 +10,8 @@
 #include <filesystem>
 #include <system_error>
 
+#include "cache/SampleCheck.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
@@ -22,10 +24,7 @@ std::string baseOf(const std::string& descriptionFile) {
     return path.replace_extension().string();
 }
 
-std::int32_t ticksAt(double seconds) {
-    const double ticks = std::round(seconds * kMayaTicksPerSecond);
-    return std::isfinite(ticks) ? static_cast<std::int32_t>(std::clamp(ticks, -2147483647.0, 2147483647.0)) : 0;
-}
+constexpr std::string_view kFloatVectors = "FloatVectorArray";
 
 /// The number at the front of the text, which is cut off. False when there is none.
 bool takeNumber(std::string_view& text, std::int64_t& number) {
@@ -174,44 +173,81 @@ bool MayaCacheReader::sampleRange(std::int32_t& first, std::int32_t& last) const
     return true;
 }
 
+MayaCacheWriter::MayaCacheWriter(const std::string& descriptionFile, const MayaCacheDescription& description,
+                                 FileOperations& operations)
+    : mDataFile(baseOf(descriptionFile) + description.dataExtension()), mDescription(description),
+      mData(mDataFile, operations), mText(descriptionFile, operations) {}
+
 std::unique_ptr<MayaCacheWriter> MayaCacheWriter::open(const std::string& descriptionFile,
-                                                       const MayaCacheDescription& description, FbxStatus& status) {
-    auto writer = std::make_unique<MayaCacheWriter>();
-    writer->mDescriptionFile = descriptionFile;
-    writer->mDescription = description;
-    const std::string dataFile = baseOf(descriptionFile) + description.dataExtension();
-    writer->mData.open(dataFile, std::ios::binary | std::ios::trunc);
+                                                       const MayaCacheDescription& description, FbxStatus& status,
+                                                       FileOperations& operations) {
+    auto writer = std::make_unique<MayaCacheWriter>(descriptionFile, description, operations);
+    if (writer->mDataFile == descriptionFile) {
+        status.SetCode(FbxStatus::eInvalidParameter, "%s: a cache description cannot have the name of its data",
+                       descriptionFile.c_str());
+        return nullptr;
+    }
+    if (!writer->mData.open(status) || !writer->mText.open(status))
+        return nullptr;
     // Like other writers of one-file caches: the true range stands in the description.
-    writer->mData << mayaCacheHeader(description.wide, 0, 1);
-    if (writer->mData)
-        return writer;
-    status.SetCode(FbxStatus::eFailure, "%s: cannot be written", dataFile.c_str());
-    return nullptr;
+    writer->mData.write(mayaCacheHeader(description.wide, 0, 1));
+    return writer;
 }
 
-bool MayaCacheWriter::write(std::size_t channel, double seconds, std::span<const double> points) {
-    if (channel >= mDescription.channels.size() || !std::isfinite(seconds))
+const char* MayaCacheWriter::faultOf(const MayaCacheChannel& channel, double seconds,
+                                     std::span<const double> points) const {
+    if (!(std::abs(seconds * kMayaTicksPerSecond) <= static_cast<double>(INT32_MAX)))
+        return "a sample at a time that a Maya cache cannot hold";
+    if (channel.name.size() > kMostMayaChannelName)
+        return "a channel with too long a name";
+    const bool doubles = channel.type != kFloatVectors;
+    if (const char* fault = mayaCacheSampleFault(mDescription.wide, points.size() / 3, doubles))
+        return fault;
+    return sampleFault(points, /*asFloats=*/!doubles);
+}
+
+bool MayaCacheWriter::failed(FbxStatus& status) const {
+    if (mFault) {
+        status.SetCode(FbxStatus::eFailure, "%s: cannot be written: %s", mDataFile.c_str(), mFault);
+    } else if (mData.failed()) {
+        mData.report(status);
+    }
+    return mFault || mData.failed();
+}
+
+bool MayaCacheWriter::write(std::size_t channel, double seconds, std::span<const double> points, FbxStatus& status) {
+    if (failed(status))
         return false;
+    if (channel >= mDescription.channels.size()) {
+        status.SetCode(FbxStatus::eIndexOutOfRange, "%s: no channel of that index", mDataFile.c_str());
+        return false;
+    }
     MayaCacheChannel& target = mDescription.channels[channel];
-    const std::int32_t ticks = ticksAt(seconds);
-    const MayaCacheWriteBlock block{target.name, points, target.type != "FloatVectorArray"};
-    mData << mayaCacheFrame(mDescription.wide, &ticks, {&block, 1});
-    mFailed = mFailed || !mData;
-    for (auto* start : {&mDescription.start, &target.start})
+    mFault = faultOf(target, seconds, points);
+    if (failed(status))
+        return false;
+    const auto ticks = static_cast<std::int32_t>(std::round(seconds * kMayaTicksPerSecond));
+    const MayaCacheWriteBlock block{target.name, points, target.type != kFloatVectors};
+    mData.write(mayaCacheFrame(mDescription.wide, &ticks, {&block, 1}));
+    extendRange(target, ticks);
+    return !failed(status);
+}
+
+void MayaCacheWriter::extendRange(MayaCacheChannel& channel, std::int32_t ticks) {
+    for (auto* start : {&mDescription.start, &channel.start})
         *start = mAnySample ? std::min(*start, ticks) : ticks;
-    for (auto* end : {&mDescription.end, &target.end})
+    for (auto* end : {&mDescription.end, &channel.end})
         *end = mAnySample ? std::max(*end, ticks) : ticks;
     mAnySample = true;
-    return !mFailed;
 }
 
 bool MayaCacheWriter::close(FbxStatus& status) {
-    mData.close();
-    if (mFailed || !mData) {
-        status.SetCode(FbxStatus::eFailure, "%s: its data could not be written", mDescriptionFile.c_str());
+    if (failed(status))
         return false;
-    }
-    return writeMayaCacheDescription(mDescriptionFile, mDescription, status);
+    mText.write(mayaCacheDescriptionText(mDescription));
+    // The description last: it is what readers open first.
+    OutputFile* const files[] = {&mData, &mText};
+    return OutputFile::commitTogether(files, status);
 }
 
 } // namespace detail

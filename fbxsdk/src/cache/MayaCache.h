@@ -4,7 +4,6 @@
 // Open Maya caches: one for reading, one for writing.
 #pragma once
 
-#include <fstream>
 #include <map>
 #include <memory>
 #include <string>
@@ -13,6 +12,7 @@
 #include "cache/MayaCacheData.h"
 #include "cache/MayaCacheDescription.h"
 #include "container/MappedFile.h"
+#include "container/OutputFile.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -44,23 +44,34 @@ private:
     std::shared_ptr<const MappedFile> mData; ///< of caches in one file
 };
 
-/// A cache in one file, of one or more channels.
+/// A cache in one file, of one or more channels. Its two files appear in close(), or never. After a fault nothing more
+/// is written, and close() fails.
 class MayaCacheWriter {
 public:
-    [[nodiscard]] static std::unique_ptr<MayaCacheWriter>
-    open(const std::string& descriptionFile, const MayaCacheDescription& description, FbxStatus& status);
-    /// Appends a sample. Times must ascend for readers that do not sort.
-    [[nodiscard]] bool write(std::size_t channel, double seconds, std::span<const double> points);
-    /// Completes the data file and writes the description.
+    [[nodiscard]] static std::unique_ptr<MayaCacheWriter> open(const std::string& descriptionFile,
+                                                               const MayaCacheDescription& description,
+                                                               FbxStatus& status,
+                                                               FileOperations& operations = systemFileOperations());
+    MayaCacheWriter(const std::string& descriptionFile, const MayaCacheDescription& description,
+                    FileOperations& operations);
+
+    /// Appends a sample. Times must ascend for readers that do not sort. False without a fault for a channel that there
+    /// is not.
+    [[nodiscard]] bool write(std::size_t channel, double seconds, std::span<const double> points, FbxStatus& status);
+    /// Completes the data file and the description.
     [[nodiscard]] bool close(FbxStatus& status);
     [[nodiscard]] MayaCacheDescription& description() { return mDescription; }
 
 private:
-    std::string mDescriptionFile;
+    const char* faultOf(const MayaCacheChannel& channel, double seconds, std::span<const double> points) const;
+    void extendRange(MayaCacheChannel& channel, std::int32_t ticks);
+    bool failed(FbxStatus& status) const;
+
+    std::string mDataFile;
     MayaCacheDescription mDescription;
-    std::ofstream mData;
+    OutputFile mData, mText;
+    const char* mFault = nullptr; ///< why a sample was refused
     bool mAnySample = false;
-    bool mFailed = false;
 };
 
 } // namespace detail

@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <bit>
+#include <cstdint>
 
 #include "container/ByteOrder.h"
 
@@ -168,6 +169,20 @@ bool readMayaCacheBlock(const MayaCacheBlock& block, std::span<double> destinati
                                        : static_cast<double>(loadNumber<float>(block.bytes.data() + i * 4, kSwap));
     }
     return true;
+}
+
+const char* mayaCacheSampleFault(bool wide, std::uint64_t pointCount, bool doubles) {
+    // Not all readers take 32-bit sizes for unsigned ones.
+    constexpr std::uint64_t kMost = INT32_MAX;
+    // The chunks before the points, with the longest name there may be.
+    constexpr std::uint64_t kOverhead = kMostMayaChannelName + 256;
+    if (pointCount == 0)
+        return "a sample without points";
+    if (pointCount > kMost)
+        return "more points than a Maya cache can count";
+    if (!wide && pointCount * 3 * (doubles ? 8 : 4) + kOverhead > kMost)
+        return "a sample of more than the 2 GiB that a cache with 32-bit sizes can hold";
+    return nullptr;
 }
 
 std::string mayaCacheHeader(bool wide, std::int32_t start, std::int32_t end) {

@@ -22,6 +22,9 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+/// Bytes of the longest name a channel can be written with; far longer than any name of an object.
+inline constexpr std::size_t kMostMayaChannelName = std::size_t{1} << 20;
+
 /// The numbers of one channel at one time.
 struct MayaCacheBlock {
     std::string_view channel;
@@ -52,6 +55,8 @@ struct MayaCacheWriteBlock {
     std::span<const double> values; ///< three per point
     bool doubles = true;
 };
+/// Null, or why a sample of one channel does not fit the sizes of that layout.
+[[nodiscard]] const char* mayaCacheSampleFault(bool wide, std::uint64_t pointCount, bool doubles);
 [[nodiscard]] std::string mayaCacheFrame(bool wide, const std::int32_t* ticks,
                                          std::span<const MayaCacheWriteBlock> blocks);
 

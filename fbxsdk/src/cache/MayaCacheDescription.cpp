@@ -7,9 +7,9 @@
 #include <algorithm>
 #include <charconv>
 #include <cstring>
-#include <filesystem>
-#include <fstream>
+#include <new>
 #include <system_error>
+#include <utility>
 
 #include <pugixml.hpp>
 
@@ -67,6 +67,27 @@ bool isChannelTag(const char* name) {
     return std::strncmp(name, kPrefix, length) == 0 && name[length] >= '0' && name[length] <= '9';
 }
 
+// The XML library has its own memory, and leaves out silently what it has none for.
+
+pugi::xml_node append(pugi::xml_node parent, pugi::xml_node_type type, const char* name) {
+    pugi::xml_node node = parent.append_child(type);
+    if (!node || !node.set_name(name))
+        throw std::bad_alloc();
+    return node;
+}
+
+template <class Value>
+void set(pugi::xml_node node, const char* name, Value value) {
+    pugi::xml_attribute attribute = node.append_attribute(name);
+    if (!attribute || std::strcmp(attribute.name(), name) != 0 || !attribute.set_value(value))
+        throw std::bad_alloc();
+}
+
+struct TextWriter : pugi::xml_writer {
+    void write(const void* data, std::size_t size) override { text.append(static_cast<const char*>(data), size); }
+    std::string text;
+};
+
 } // namespace
 
 bool readMayaCacheDescription(const std::string& fileName, MayaCacheDescription& description, FbxStatus& status) {
@@ -104,35 +125,33 @@ bool readMayaCacheDescription(const std::string& fileName, MayaCacheDescription&
     return true;
 }
 
-bool writeMayaCacheDescription(const std::string& fileName, const MayaCacheDescription& description,
-                               FbxStatus& status) {
+std::string mayaCacheDescriptionText(const MayaCacheDescription& description) {
     pugi::xml_document document;
-    pugi::xml_node declaration = document.append_child(pugi::node_declaration);
-    declaration.append_attribute("version") = "1.0";
-    pugi::xml_node root = document.append_child(kRootTag);
-    pugi::xml_node type = root.append_child("cacheType");
-    type.append_attribute("Type") = description.oneFile ? "OneFile" : "OneFilePerFrame";
-    type.append_attribute("Format") = description.wide ? "mcx" : "mcc";
+    pugi::xml_node declaration = append(document, pugi::node_declaration, "xml");
+    set(declaration, "version", "1.0");
+    pugi::xml_node root = append(document, pugi::node_element, kRootTag);
+    pugi::xml_node type = append(root, pugi::node_element, "cacheType");
+    set(type, "Type", description.oneFile ? "OneFile" : "OneFilePerFrame");
+    set(type, "Format", description.wide ? "mcx" : "mcc");
     const std::string range = std::to_string(description.start) + "-" + std::to_string(description.end);
-    root.append_child("time").append_attribute("Range") = range.c_str();
-    root.append_child("cacheTimePerFrame").append_attribute("TimePerFrame") = description.ticksPerFrame;
-    root.append_child("cacheVersion").append_attribute("Version") = "2.0";
-    pugi::xml_node channels = root.append_child("Channels");
+    set(append(root, pugi::node_element, "time"), "Range", range.c_str());
+    set(append(root, pugi::node_element, "cacheTimePerFrame"), "TimePerFrame", description.ticksPerFrame);
+    set(append(root, pugi::node_element, "cacheVersion"), "Version", "2.0");
+    pugi::xml_node channels = append(root, pugi::node_element, "Channels");
     for (std::size_t i = 0; i < description.channels.size(); ++i) {
         const MayaCacheChannel& channel = description.channels[i];
-        pugi::xml_node node = channels.append_child(("channel" + std::to_string(i)).c_str());
-        node.append_attribute("ChannelName") = channel.name.c_str();
-        node.append_attribute("ChannelType") = channel.type.c_str();
-        node.append_attribute("ChannelInterpretation") = channel.interpretation.c_str();
-        node.append_attribute("SamplingType") = channel.regular ? "Regular" : "Irregular";
-        node.append_attribute("SamplingRate") = channel.samplingRate;
-        node.append_attribute("StartTime") = channel.start;
-        node.append_attribute("EndTime") = channel.end;
+        pugi::xml_node node = append(channels, pugi::node_element, ("channel" + std::to_string(i)).c_str());
+        set(node, "ChannelName", channel.name.c_str());
+        set(node, "ChannelType", channel.type.c_str());
+        set(node, "ChannelInterpretation", channel.interpretation.c_str());
+        set(node, "SamplingType", channel.regular ? "Regular" : "Irregular");
+        set(node, "SamplingRate", channel.samplingRate);
+        set(node, "StartTime", channel.start);
+        set(node, "EndTime", channel.end);
     }
-    if (document.save_file(fileName.c_str(), "  "))
-        return true;
-    status.SetCode(FbxStatus::eFailure, "%s: cannot be written", fileName.c_str());
-    return false;
+    TextWriter text;
+    document.save(text, "  ");
+    return std::move(text.text);
 }
 
 } // namespace detail

@@ -40,8 +40,8 @@ struct MayaCacheDescription {
 /// False when the file is missing, is no XML, nests too deeply or is no cache description.
 [[nodiscard]] bool readMayaCacheDescription(const std::string& fileName, MayaCacheDescription& description,
                                             FbxStatus& status);
-[[nodiscard]] bool writeMayaCacheDescription(const std::string& fileName, const MayaCacheDescription& description,
-                                             FbxStatus& status);
+/// What stands in the file.
+[[nodiscard]] std::string mayaCacheDescriptionText(const MayaCacheDescription& description);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

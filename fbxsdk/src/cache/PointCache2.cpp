@@ -5,11 +5,13 @@
 #include "cache/PointCache2.h"
 
 #include <algorithm>
+#include <array>
 #include <bit>
 #include <cmath>
+#include <cstdint>
 #include <cstring>
-#include <vector>
 
+#include "cache/SampleCheck.h"
 #include "container/ByteOrder.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -32,6 +34,24 @@ void storeNumber(char* bytes, Number number) {
 /// Some writers put a rate in frames per second where frames per sample belong: more than one frame per sample is
 /// unheard of, a rate at or below one is.
 double framesPerSample(float stored) { return stored > 0.0F && stored <= 1.0F ? static_cast<double>(stored) : 1.0; }
+
+/// Null, or what cannot stand in a header.
+const char* headerFault(const PointCacheHeader& header) {
+    constexpr std::uint64_t kMostCount = INT32_MAX, kMostBytes = INT64_MAX;
+    constexpr double kMostFrame = INT32_MAX;
+    if (header.pointCount == 0)
+        return "samples without points";
+    if (header.pointCount > kMostCount || header.sampleCount > kMostCount)
+        return "more points or samples than a point cache can count";
+    if (header.sampleCount > 0 && sampleBytes(header) > (kMostBytes - kHeaderBytes) / header.sampleCount)
+        return "more samples than a file can hold";
+    if (!(std::abs(header.startFrame) <= kMostFrame))
+        return "a start frame that is none";
+    // Large frame numbers are rounded in the header: every sample would be at another frame.
+    constexpr double kHalfFrame = 0.5;
+    const auto stored = static_cast<double>(static_cast<float>(header.startFrame));
+    return std::abs(stored - header.startFrame) < kHalfFrame ? nullptr : "a start frame that is too large";
+}
 
 } // namespace
 
@@ -80,11 +100,19 @@ bool PointCacheReader::read(double frame, std::span<double> points) const {
     return true;
 }
 
+PointCacheWriter::PointCacheWriter(const std::string& fileName, const PointCacheHeader& header,
+                                   FileOperations& operations)
+    : mFileName(fileName), mFile(fileName, operations), mHeader(header) {}
+
 std::unique_ptr<PointCacheWriter> PointCacheWriter::open(const std::string& fileName, const PointCacheHeader& header,
-                                                         FbxStatus& status) {
-    auto writer = std::make_unique<PointCacheWriter>();
-    writer->mFileName = fileName;
-    writer->mHeader = header;
+                                                         FbxStatus& status, FileOperations& operations) {
+    if (const char* fault = headerFault(header)) {
+        status.SetCode(FbxStatus::eInvalidParameter, "%s: cannot be written: %s", fileName.c_str(), fault);
+        return nullptr;
+    }
+    auto writer = std::make_unique<PointCacheWriter>(fileName, header, operations);
+    if (!writer->mFile.open(status))
+        return nullptr;
     char bytes[kHeaderBytes] = {};
     std::memcpy(bytes, kMagic, sizeof kMagic);
     storeNumber(bytes + 12, std::int32_t{1});
@@ -92,40 +120,60 @@ std::unique_ptr<PointCacheWriter> PointCacheWriter::open(const std::string& file
     storeNumber(bytes + 20, static_cast<float>(header.startFrame));
     storeNumber(bytes + 24, static_cast<float>(header.framesPerSample));
     storeNumber(bytes + 28, header.sampleCount);
-    writer->mFile.open(fileName, std::ios::binary | std::ios::trunc | std::ios::in | std::ios::out);
-    writer->mFile.write(bytes, sizeof bytes);
-    if (writer->mFile)
-        return writer;
-    status.SetCode(FbxStatus::eFailure, "%s: cannot be written", fileName.c_str());
-    return nullptr;
+    writer->mFile.write(bytes);
+    return writer;
 }
 
-bool PointCacheWriter::write(double frame, const double* points) {
-    const double slot = std::round(frame - mHeader.startFrame);
-    if (!(slot >= 0.0) || slot >= static_cast<double>(mHeader.sampleCount))
-        return false;
-    std::vector<char> bytes(sampleBytes(mHeader));
-    for (std::size_t i = 0; i < std::size_t{mHeader.pointCount} * 3; ++i) {
-        storeNumber(bytes.data() + i * 4, static_cast<float>(points[i]));
+bool PointCacheWriter::failed(FbxStatus& status) const {
+    if (mFault) {
+        status.SetCode(FbxStatus::eFailure, "%s: cannot be written: %s", mFileName.c_str(), mFault);
+    } else if (mFile.failed()) {
+        mFile.report(status);
     }
-    mFile.seekp(static_cast<std::streamoff>(kHeaderBytes + static_cast<std::uint64_t>(slot) * sampleBytes(mHeader)));
-    mFile.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
-    mFailed = mFailed || !mFile;
-    return !mFailed;
+    return mFault || mFile.failed();
+}
+
+bool PointCacheWriter::write(double frame, const double* points, FbxStatus& status) {
+    if (failed(status))
+        return false;
+    const double slot = std::round(frame - mHeader.startFrame);
+    if (!(slot >= 0.0) || slot >= static_cast<double>(mHeader.sampleCount)) {
+        status.SetCode(FbxStatus::eIndexOutOfRange, "%s: a frame outside the cache's samples", mFileName.c_str());
+        return false;
+    }
+    const std::span<const double> sample(points, std::size_t{mHeader.pointCount} * 3);
+    mFault = sampleFault(sample, /*asFloats=*/true);
+    if (failed(status))
+        return false;
+    put(kHeaderBytes + static_cast<std::uint64_t>(slot) * sampleBytes(mHeader), sample);
+    return !failed(status);
+}
+
+void PointCacheWriter::put(std::uint64_t offset, std::span<const double> points) {
+    std::array<char, std::size_t{1} << 15U> bytes;
+    constexpr std::size_t kPiece = bytes.size() / sizeof(float);
+    mFile.extend(offset);
+    while (!points.empty()) {
+        const std::span<const double> piece = points.first(std::min(kPiece, points.size()));
+        for (std::size_t i = 0; i < piece.size(); ++i)
+            storeNumber(bytes.data() + i * sizeof(float), static_cast<float>(piece[i]));
+        const std::span<const char> stored(bytes.data(), piece.size() * sizeof(float));
+        // A sample is either all behind what is written or all within.
+        if (offset < mFile.size()) {
+            mFile.overwrite(offset, stored);
+        } else {
+            mFile.write(stored);
+        }
+        offset += stored.size();
+        points = points.subspan(piece.size());
+    }
 }
 
 bool PointCacheWriter::close(FbxStatus& status) {
-    const std::uint64_t whole = kHeaderBytes + sampleBytes(mHeader) * mHeader.sampleCount;
-    mFile.seekp(0, std::ios::end);
-    if (mFile && static_cast<std::uint64_t>(mFile.tellp()) < whole) {
-        mFile.seekp(static_cast<std::streamoff>(whole - 1));
-        mFile.put('\0');
-    }
-    mFile.close();
-    if (!mFailed && mFile)
-        return true;
-    status.SetCode(FbxStatus::eFailure, "%s: could not be written whole", mFileName.c_str());
-    return false;
+    if (failed(status))
+        return false;
+    mFile.extend(kHeaderBytes + sampleBytes(mHeader) * mHeader.sampleCount);
+    return mFile.commit(status);
 }
 
 } // namespace detail

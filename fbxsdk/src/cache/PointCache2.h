@@ -7,12 +7,12 @@
 //   samples
 #pragma once
 
-#include <fstream>
 #include <memory>
 #include <span>
 #include <string>
 
 #include "container/MappedFile.h"
+#include "container/OutputFile.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -39,21 +39,28 @@ private:
     PointCacheHeader mHeader;
 };
 
+/// The file appears in close(), or never. After a fault nothing more is written, and close() fails.
 class PointCacheWriter {
 public:
     [[nodiscard]] static std::unique_ptr<PointCacheWriter> open(const std::string& fileName,
-                                                                const PointCacheHeader& header, FbxStatus& status);
-    /// Writes the sample of a frame to its place. False for a frame outside the samples.
-    [[nodiscard]] bool write(double frame, const double* points);
+                                                                const PointCacheHeader& header, FbxStatus& status,
+                                                                FileOperations& operations = systemFileOperations());
+    PointCacheWriter(const std::string& fileName, const PointCacheHeader& header, FileOperations& operations);
+
+    /// Writes the sample of a frame to its place. False without a fault for a frame outside the samples.
+    [[nodiscard]] bool write(double frame, const double* points, FbxStatus& status);
     /// Fills up missing samples at the end, so that the file has the size that its header promises.
     [[nodiscard]] bool close(FbxStatus& status);
     [[nodiscard]] const PointCacheHeader& header() const { return mHeader; }
 
 private:
+    bool failed(FbxStatus& status) const;
+    void put(std::uint64_t offset, std::span<const double> points);
+
     std::string mFileName;
-    std::fstream mFile;
+    OutputFile mFile;
     PointCacheHeader mHeader;
-    bool mFailed = false;
+    const char* mFault = nullptr; ///< why a sample was refused
 };
 
 } // namespace detail

@@ -19,9 +19,9 @@ namespace {
 
 int outcome(int result) { return result < 0 ? errno : 0; }
 
-/// Repeats a write until all bytes are through. `step` gets what is left and how much went before.
-template <class Step>
-int writeAll(std::span<const char> bytes, const Step& step) {
+/// Repeats a system call until all bytes are through. `step` gets what is left and how much went before.
+template <class Byte, class Step>
+int transferAll(std::span<Byte> bytes, const Step& step) {
     std::size_t done = 0;
     while (done < bytes.size()) {
         const ssize_t count = step(bytes.subspan(done), done);
@@ -70,7 +70,7 @@ private:
 
 int FileOperations::create(const std::string& path, unsigned permissions, int& file) {
     constexpr mode_t kUsual = 0666; // less what the process masks
-    file = ::open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, kUsual);
+    file = ::open(path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, kUsual);
     if (file < 0) {
         return errno;
     }
@@ -93,12 +93,18 @@ int FileOperations::openExisting(const std::string& path, int& file) {
 
 int FileOperations::write(int file, std::span<const char> bytes) {
     const PipeSignalGuard guard;
-    return writeAll(bytes, [file](auto rest, std::size_t) { return ::write(file, rest.data(), rest.size()); });
+    return transferAll(bytes, [file](auto rest, std::size_t) { return ::write(file, rest.data(), rest.size()); });
 }
 
 int FileOperations::writeAt(int file, std::uint64_t offset, std::span<const char> bytes) {
-    return writeAll(bytes, [=](auto rest, std::size_t done) {
+    return transferAll(bytes, [=](auto rest, std::size_t done) {
         return ::pwrite(file, rest.data(), rest.size(), static_cast<off_t>(offset + done));
+    });
+}
+
+int FileOperations::readAt(int file, std::uint64_t offset, std::span<char> bytes) {
+    return transferAll(bytes, [=](auto rest, std::size_t done) {
+        return ::pread(file, rest.data(), rest.size(), static_cast<off_t>(offset + done));
     });
 }
 
@@ -117,6 +123,10 @@ int FileOperations::rename(const std::string& from, const std::string& to) {
     return outcome(std::rename(from.c_str(), to.c_str()));
 }
 
+int FileOperations::link(const std::string& file, const std::string& secondName) {
+    return outcome(::link(file.c_str(), secondName.c_str()));
+}
+
 int FileOperations::remove(const std::string& path) { return outcome(::unlink(path.c_str())); }
 
 void FileOperations::flushFolder(const std::string& path) {
@@ -125,6 +135,11 @@ void FileOperations::flushFolder(const std::string& path) {
         ::fsync(folder);
         ::close(folder);
     }
+}
+
+FileOperations& systemFileOperations() {
+    static FileOperations operations;
+    return operations;
 }
 
 } // namespace detail

@@ -19,7 +19,7 @@ namespace detail {
 namespace {
 
 constexpr std::size_t kBufferBytes = std::size_t{1} << 18;
-/// Names that are tried for the file beside the target before giving up.
+/// Names that are tried for a file of our own before giving up.
 constexpr int kMostNames = 1000;
 /// Links that are followed, as many as the system follows.
 constexpr int kMostLinks = 40;
@@ -45,9 +45,25 @@ std::string folderOf(const std::string& path) {
     return slash == std::string::npos ? "./" : path.substr(0, slash + 1);
 }
 
-} // namespace
+/// Tries names in the folder until `make` gives another error than that the name is taken. `path` is the last one.
+template <class Make>
+int tryNames(const std::string& folder, std::string& path, const Make& make) {
+    // Not derived from the target's name, which may be as long as a name can be.
+    const std::string prefix = folder + ".fbx-" + std::to_string(::getpid()) + "-";
+    for (int i = 0; i < kMostNames; ++i) {
+        path = prefix + std::to_string(i) + ".part";
+        const int error = make();
+        if (error != EEXIST) {
+            return error;
+        }
+    }
+    return EEXIST;
+}
 
-OutputFile::OutputFile(std::string fileName) : mOperations(mSystem), mName(std::move(fileName)) {}
+/// Whether the file system, or its rules, just do not let a file have two names.
+bool isWithoutLinks(int error) { return error == EPERM || error == ENOTSUP || error == ENOSYS || error == EMLINK; }
+
+} // namespace
 
 OutputFile::OutputFile(std::string fileName, FileOperations& operations)
     : mOperations(operations), mName(std::move(fileName)) {}
@@ -60,20 +76,28 @@ void OutputFile::note(int error) {
     }
 }
 
+void OutputFile::report(FbxStatus& status) const {
+    status.SetCode(FbxStatus::eFailure, "%s: cannot be written: %s", mName.c_str(),
+                   std::generic_category().message(mError).c_str());
+}
+
 bool OutputFile::fail(int error, FbxStatus& status) {
     note(error);
     discard();
-    status.SetCode(FbxStatus::eFailure, "%s: cannot be written: %s", mName.c_str(),
-                   std::generic_category().message(mError).c_str());
+    report(status);
     return false;
 }
 
 bool OutputFile::open(FbxStatus& status) {
+    if (mName.empty()) {
+        return fail(ENOENT, status);
+    }
     int error = 0;
     mTarget = behindLinks(mName, error);
     if (error != 0) {
         return fail(error, status);
     }
+    mFolder = folderOf(mTarget);
     struct stat existing {};
     const bool exists = ::stat(mTarget.c_str(), &existing) == 0;
     if (exists && S_ISDIR(existing.st_mode)) {
@@ -93,45 +117,57 @@ bool OutputFile::open(FbxStatus& status) {
 }
 
 int OutputFile::openBeside(unsigned permissions) {
-    // Not derived from the target's name, which may be as long as a name can be.
-    const std::string prefix = folderOf(mTarget) + ".fbx-" + std::to_string(::getpid()) + "-";
-    for (int i = 0; i < kMostNames; ++i) {
-        const std::string path = prefix + std::to_string(i) + ".part";
-        const int error = mOperations.create(path, permissions, mFile);
-        if (error == 0) {
-            mTemporary = path;
-        }
-        if (error != EEXIST) {
-            return error;
-        }
+    std::string path;
+    const int error = tryNames(mFolder, path, [&] { return mOperations.create(path, permissions, mFile); });
+    if (error == 0) {
+        mTemporary = std::move(path);
     }
-    return EEXIST;
+    return error;
+}
+
+int OutputFile::openSpool() {
+    std::error_code failure;
+    const std::string folder = (std::filesystem::temp_directory_path(failure) / "").string();
+    if (failure) {
+        return failure.value();
+    }
+    constexpr unsigned kOnlyForUs = 0600;
+    std::string path;
+    const int error = tryNames(folder, path, [&] { return mOperations.create(path, kOnlyForUs, mFile); });
+    if (error == 0) {
+        mOperations.remove(path); // the file itself lives until it is closed
+    }
+    return error;
 }
 
 void OutputFile::write(std::span<const char> bytes) {
     if (failed()) {
         return;
     }
-    const bool large = !mDirect && bytes.size() >= kBufferBytes;
-    if (large) {
+    if (bytes.size() >= kBufferBytes) {
         flushBuffer();
-        note(failed() ? 0 : mOperations.write(mFile, bytes));
-        mWritten += bytes.size();
+        sendBuffer(bytes);
         return;
     }
     mBuffer.append(bytes.data(), bytes.size());
-    if (!mDirect && mBuffer.size() >= kBufferBytes) {
+    if (mBuffer.size() >= kBufferBytes) {
         flushBuffer();
     }
 }
 
 void OutputFile::flushBuffer() {
-    if (failed() || mBuffer.empty()) {
-        return;
-    }
-    note(mOperations.write(mFile, mBuffer));
-    mWritten += mBuffer.size();
+    sendBuffer(mBuffer);
     mBuffer.clear();
+}
+
+void OutputFile::sendBuffer(std::span<const char> bytes) {
+    if (!failed() && mFile < 0) {
+        note(openSpool());
+    }
+    if (!failed() && !bytes.empty()) {
+        note(mOperations.writeAt(mFile, mWritten, bytes));
+    }
+    mWritten += bytes.size();
 }
 
 void OutputFile::overwrite(std::uint64_t offset, std::span<const char> bytes) {
@@ -149,29 +185,111 @@ void OutputFile::overwrite(std::uint64_t offset, std::span<const char> bytes) {
               mBuffer.begin() + static_cast<std::ptrdiff_t>(std::max(offset, mWritten) - mWritten));
 }
 
+void OutputFile::extend(std::uint64_t newSize) {
+    if (failed() || newSize <= size()) {
+        return;
+    }
+    const std::uint64_t gap = newSize - size();
+    if (gap < kBufferBytes) {
+        mBuffer.append(static_cast<std::size_t>(gap), '\0');
+        return;
+    }
+    // What lies between the end and a byte behind it is zero, and takes no place where the file system can spare it.
+    flushBuffer();
+    mWritten = newSize - 1;
+    mBuffer.push_back('\0');
+}
+
 bool OutputFile::commit(FbxStatus& status) {
-    if (mDirect) {
-        sendDirectly();
-    } else {
+    OutputFile* const only = this;
+    return commitTogether({&only, 1}, status);
+}
+
+bool OutputFile::commitTogether(std::span<OutputFile* const> files, FbxStatus& status) {
+    const auto all = [&](std::span<OutputFile* const> some, bool (OutputFile::*step)(FbxStatus&)) {
+        return std::all_of(some.begin(), some.end(), [&](OutputFile* file) { return (file->*step)(status); });
+    };
+    // Behind the last there is nothing that could fail and make its old file necessary.
+    const bool done = all(files, &OutputFile::complete) && all(files.first(files.size() - 1), &OutputFile::keepOld) &&
+                      all(files, &OutputFile::takeName);
+    for (OutputFile* file : files) {
+        if (done) {
+            file->forgetOld();
+        } else {
+            file->discard();
+        }
+    }
+    return done;
+}
+
+bool OutputFile::complete(FbxStatus& status) {
+    if (!mDirect && !failed()) {
         flushBuffer();
         note(failed() ? 0 : mOperations.flush(mFile));
         closeFile();
-        note(failed() ? 0 : mOperations.rename(mTemporary, mTarget));
     }
-    if (failed()) {
-        return fail(mError, status);
+    return !failed() || fail(mError, status);
+}
+
+bool OutputFile::keepOld(FbxStatus& status) {
+    if (mDirect) {
+        return true;
     }
-    if (!mDirect) {
-        mTemporary.clear();
-        mOperations.flushFolder(folderOf(mTarget));
+    std::string path;
+    const int error = tryNames(mFolder, path, [&] { return mOperations.link(mTarget, path); });
+    if (error == 0) {
+        mOld = std::move(path);
     }
+    mStoodAlone = error == ENOENT;
+    return error == 0 || mStoodAlone || isWithoutLinks(error) || fail(error, status);
+}
+
+bool OutputFile::takeName(FbxStatus& status) {
+    if (mDirect) {
+        sendDirectly();
+        return !failed() || fail(mError, status);
+    }
+    const int error = mOperations.rename(mTemporary, mTarget);
+    if (error != 0) {
+        return fail(error, status);
+    }
+    mTemporary.clear();
+    mTookName = true;
     return true;
 }
 
+void OutputFile::forgetOld() {
+    mTookName = false;
+    discard();
+    if (!mDirect) {
+        mOperations.flushFolder(mFolder);
+    }
+}
+
 void OutputFile::sendDirectly() {
-    note(failed() ? 0 : mOperations.openExisting(mTarget, mFile));
-    note(failed() ? 0 : mOperations.write(mFile, mBuffer));
-    closeFile();
+    if (mFile >= 0) {
+        flushBuffer();
+    }
+    int target = -1;
+    note(failed() ? 0 : mOperations.openExisting(mTarget, target));
+    if (failed()) {
+        return;
+    }
+    note(sendTo(target));
+    note(mOperations.close(target));
+}
+
+int OutputFile::sendTo(int target) {
+    std::string piece;
+    for (std::uint64_t offset = 0; offset < mWritten; offset += piece.size()) {
+        piece.resize(static_cast<std::size_t>(std::min<std::uint64_t>(mWritten - offset, kBufferBytes)));
+        int error = mOperations.readAt(mFile, offset, piece);
+        error = error == 0 ? mOperations.write(target, piece) : error;
+        if (error != 0) {
+            return error;
+        }
+    }
+    return mOperations.write(target, mBuffer);
 }
 
 void OutputFile::closeFile() {
@@ -187,7 +305,20 @@ void OutputFile::discard() {
         mOperations.remove(mTemporary);
         mTemporary.clear();
     }
+    putBack();
     mBuffer.clear();
+}
+
+void OutputFile::putBack() {
+    if (mTookName && !mOld.empty()) {
+        mOperations.rename(mOld, mTarget);
+    } else if (mTookName && mStoodAlone) {
+        mOperations.remove(mTarget);
+    } else if (!mOld.empty()) {
+        mOperations.remove(mOld);
+    }
+    mTookName = false;
+    mOld.clear();
 }
 
 } // namespace detail

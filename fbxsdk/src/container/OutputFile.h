@@ -19,12 +19,11 @@ namespace detail {
 /// after any fault, what stood there before is as it was. Without commit() nothing is left behind.
 ///
 /// A link is followed: the file that it leads to is replaced. A pipe or a device cannot be replaced; it gets the bytes
-/// in commit(), all at once.
+/// in commit(), all at once. Never more than a small part of the bytes is in memory.
 class OutputFile final : public ByteOutput {
 public:
-    explicit OutputFile(std::string fileName);
     /// The operations must outlive the file.
-    OutputFile(std::string fileName, FileOperations& operations);
+    explicit OutputFile(std::string fileName, FileOperations& operations = systemFileOperations());
     ~OutputFile() override;
 
     /// False when the file could not be written anyway; the status says why.
@@ -32,28 +31,46 @@ public:
 
     void write(std::span<const char> bytes) override;
     void overwrite(std::uint64_t offset, std::span<const char> bytes) override;
+    /// Appends zeros until that size is reached.
+    void extend(std::uint64_t size);
     [[nodiscard]] std::uint64_t size() const override { return mWritten + mBuffer.size(); }
     [[nodiscard]] bool failed() const override { return mError != 0; }
+    /// Says in the status why it failed.
+    void report(FbxStatus& status) const;
 
     /// Completes the file. False when that or any write before it failed; the status says why.
     [[nodiscard]] bool commit(FbxStatus& status);
+    /// Completes files that belong together, which appear in this order: all of them, or none and what stood there
+    /// before is there again. On a file system without hard links only the last of them can fail without a trace.
+    [[nodiscard]] static bool commitTogether(std::span<OutputFile* const> files, FbxStatus& status);
 
 private:
     bool fail(int error, FbxStatus& status);
     void note(int error);
     void flushBuffer();
+    void sendBuffer(std::span<const char> bytes);
     int openBeside(unsigned permissions);
+    int openSpool();
+    bool complete(FbxStatus& status);
+    bool keepOld(FbxStatus& status);
+    bool takeName(FbxStatus& status);
+    void forgetOld();
     void closeFile();
     void discard();
+    void putBack();
     void sendDirectly();
+    int sendTo(int file);
 
-    FileOperations mSystem;
     FileOperations& mOperations;
     std::string mName;      ///< as given, for messages
     std::string mTarget;    ///< behind all links
+    std::string mFolder;    ///< of the target
     std::string mTemporary; ///< empty when there is none
-    bool mDirect = false;   ///< a pipe or a device: everything stays in the buffer until the end
-    int mFile = -1;
+    std::string mOld;       ///< the second name of what stood there before; empty when there is none
+    bool mDirect = false;   ///< a pipe or a device
+    bool mTookName = false;
+    bool mStoodAlone = false; ///< nothing stood there before
+    int mFile = -1;           ///< for a pipe or device that gets much: a nameless file until the end
     int mError = 0;
     std::string mBuffer;
     std::uint64_t mWritten = 0; ///< bytes before those in the buffer

@@ -4,6 +4,7 @@
 // The usual records in one line each.
 #pragma once
 
+#include <exception>
 #include <initializer_list>
 #include <span>
 #include <string_view>
@@ -31,7 +32,8 @@ void writeArray(RecordSink& sink, std::string_view name, std::span<const Number>
     sink.endRecord();
 }
 
-/// A record with a block, open as long as the object lives.
+/// A record with a block, open as long as the object lives. To end it may take memory that there is not; a record that
+/// an exception leaves is not ended, since nobody is going to read it.
 class BlockScope {
 public:
     BlockScope(RecordSink& sink, std::string_view name) : mSink(sink) {
@@ -50,10 +52,15 @@ public:
     }
     BlockScope(const BlockScope&) = delete;
     BlockScope& operator=(const BlockScope&) = delete;
-    ~BlockScope() { mSink.endRecord(); }
+    ~BlockScope() noexcept(false) {
+        if (std::uncaught_exceptions() == mExceptions) {
+            mSink.endRecord();
+        }
+    }
 
 private:
     RecordSink& mSink;
+    int mExceptions = std::uncaught_exceptions();
 };
 
 } // namespace detail

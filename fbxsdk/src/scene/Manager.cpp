@@ -65,7 +65,7 @@ void ManagerData::leave(FbxObject& object) {
     objects.pop_back();
 }
 
-void ManagerData::destroyTogether(const std::vector<FbxObject*>& objects) {
+void ManagerData::destroyTogether(std::span<FbxObject* const> objects) {
     for (FbxObject* object : objects)
         object->mData->doomed = true;
     for (FbxObject* object : objects)

@@ -5,6 +5,7 @@
 #pragma once
 
 #include <cstdint>
+#include <span>
 #include <vector>
 
 #include <fbxsdk/FbxIOPluginRegistry.h>
@@ -36,7 +37,7 @@ public:
     /// The same, connected as a source of the container.
     static FbxObject* createObject(FbxObject* container, const FbxClassId& id, const char* name);
     /// Cuts what connects the objects with others and frees them. What connects them with each other needs no cutting.
-    static void destroyTogether(const std::vector<FbxObject*>& objects);
+    static void destroyTogether(std::span<FbxObject* const> objects);
     /// Frees everything at once, without cutting connections one by one.
     void destroyAll();
 

@@ -38,13 +38,28 @@ FbxObject::FbxObject(FbxManager& pManager, const detail::ClassInfo& pInfo)
 
 FbxObject::~FbxObject() { mData->manager->data().leave(*this); }
 
+namespace {
+
+/// What every scene has goes with the scene only.
+bool isKeptByScene(const FbxObject& object) {
+    const FbxScene* scene = object.GetScene();
+    return scene && scene != &object && scene->sceneData().isFixed(object);
+}
+
+} // namespace
+
 void FbxObject::Destroy(bool pRecursive) {
+    if (!pRecursive && !Is<FbxScene>()) {
+        // Takes nothing along, and no memory: whoever is done with an object can rely on it.
+        FbxObject* const alone = this;
+        if (!isKeptByScene(*this))
+            detail::ManagerData::destroyTogether({&alone, 1});
+        return;
+    }
     std::vector<FbxObject*> doomed;
     std::unordered_set<const FbxObject*> known;
     const auto doom = [&](FbxObject& object) {
-        // What every scene has goes with the scene only.
-        const FbxScene* scene = object.GetScene();
-        const bool isKept = scene && scene != &object && !known.contains(scene) && scene->sceneData().isFixed(object);
+        const bool isKept = isKeptByScene(object) && !known.contains(object.GetScene());
         if (!isKept && known.insert(&object).second)
             doomed.push_back(&object);
     };

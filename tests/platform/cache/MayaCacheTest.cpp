@@ -34,7 +34,7 @@ std::string writeBall(const support::TemporaryFolder& folder, bool wide, const c
     EXPECT_TRUE(writer) << status.GetErrorString();
     for (int f = 10; f <= 12; ++f) {
         const std::array<double, 6> points = {double(f), 0, double(-f), double(f), 1, double(-f)};
-        EXPECT_TRUE(writer->write(0, f / 24.0, points));
+        EXPECT_TRUE(writer->write(0, f / 24.0, points, status));
     }
     EXPECT_TRUE(writer->close(status)) << status.GetErrorString();
     return file;
@@ -114,7 +114,7 @@ TEST(MayaCache, ReadsOneFilePerFrameInOrderAndSkipsMissingOnes) {
     MayaCacheDescription description = oneChannel(false);
     description.oneFile = false;
     FbxStatus status;
-    ASSERT_TRUE(writeMayaCacheDescription(folder.file("ball.xml"), description, status));
+    folder.write("ball.xml", mayaCacheDescriptionText(description));
     const auto writeFrame = [&](const char* name, double x) {
         const std::array<double, 6> points = {x, 0, 0, x, 0, 0};
         const MayaCacheWriteBlock block{"ball", points, true};

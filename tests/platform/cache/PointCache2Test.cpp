@@ -23,7 +23,7 @@ std::string writeThree(const support::TemporaryFolder& folder) {
     EXPECT_TRUE(writer) << status.GetErrorString();
     for (int f = 10; f <= 12; ++f) {
         const std::array<double, 3> point = {double(f), 0, double(-f)};
-        EXPECT_TRUE(writer->write(f, point.data()));
+        EXPECT_TRUE(writer->write(f, point.data(), status));
     }
     EXPECT_TRUE(writer->close(status));
     return file;
@@ -73,9 +73,9 @@ TEST(PointCache2, RefusesFramesOutsideItsSamplesWhenWriting) {
     ASSERT_TRUE(writer);
     const std::array<double, 3> point{};
 
-    EXPECT_FALSE(writer->write(9, point.data()));
-    EXPECT_FALSE(writer->write(13, point.data()));
-    EXPECT_TRUE(writer->write(11, point.data()));
+    EXPECT_FALSE(writer->write(9, point.data(), status));
+    EXPECT_FALSE(writer->write(13, point.data(), status));
+    EXPECT_TRUE(writer->write(11, point.data(), status));
     EXPECT_TRUE(writer->close(status));
     EXPECT_EQ(folder.read("ball.pc2").size(), 32U + 3U * 12U);
 }

@@ -4,6 +4,7 @@
 // A file is there completely or not at all, whatever fails.
 #include "container/OutputFile.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <filesystem>
 #include <string>
@@ -17,23 +18,19 @@
 
 #include <gtest/gtest.h>
 
+#include "support/AsNobody.h"
+#include "support/FailingOperations.h"
 #include "support/TemporaryFolder.h"
 
 namespace fbxsdk::detail {
 namespace {
 
 namespace fs = std::filesystem;
+using support::AsNobody;
+using support::FailingOperations;
 using support::TemporaryFolder;
 
 std::span<const char> span(const std::string& text) { return {text.data(), text.size()}; }
-
-std::vector<std::string> filesIn(const TemporaryFolder& folder) {
-    std::vector<std::string> names;
-    for (const auto& entry : fs::directory_iterator(folder.path())) {
-        names.push_back(entry.path().filename());
-    }
-    return names;
-}
 
 bool writeFile(const std::string& name, const std::string& content, FbxStatus& status) {
     OutputFile file(name);
@@ -51,30 +48,13 @@ bool writeFile(const std::string& name, const std::string& content) {
     return written;
 }
 
-/// Runs as nobody, who owns nothing, for what a superuser would be allowed to do.
-class AsNobody {
-public:
-    AsNobody() { mChanged = ::geteuid() == 0 && ::seteuid(kNobody) == 0; }
-    AsNobody(const AsNobody&) = delete;
-    AsNobody& operator=(const AsNobody&) = delete;
-    ~AsNobody() {
-        if (mChanged) {
-            EXPECT_EQ(::seteuid(0), 0);
-        }
-    }
-
-private:
-    static constexpr uid_t kNobody = 65534;
-    bool mChanged = false;
-};
-
 TEST(OutputFile, AppearsWithItsContent) {
     const TemporaryFolder folder;
 
     EXPECT_TRUE(writeFile(folder.file("a.fbx"), "content"));
 
     EXPECT_EQ(folder.read("a.fbx"), "content");
-    EXPECT_EQ(filesIn(folder), std::vector<std::string>{"a.fbx"});
+    EXPECT_EQ(folder.files(), std::vector<std::string>{"a.fbx"});
 }
 
 TEST(OutputFile, ReplacesWhatStoodThere) {
@@ -108,7 +88,7 @@ TEST(OutputFile, LeavesNothingWhenItIsGivenUp) {
     }
 
     EXPECT_EQ(folder.read("a.fbx"), "old");
-    EXPECT_EQ(filesIn(folder), std::vector<std::string>{"a.fbx"});
+    EXPECT_EQ(folder.files(), std::vector<std::string>{"a.fbx"});
 }
 
 TEST(OutputFile, ChangesBytesThatAreOnTheMediumInTheBufferAndAcross) {
@@ -212,7 +192,7 @@ TEST(OutputFile, WorksInTheCurrentFolder) {
 
     fs::current_path(before);
     EXPECT_EQ(folder.read("plain.fbx"), "content");
-    EXPECT_EQ(filesIn(folder).size(), 1U);
+    EXPECT_EQ(folder.files().size(), 1U);
 }
 
 TEST(OutputFile, RefusesAFolder) {
@@ -229,7 +209,7 @@ TEST(OutputFile, RefusesAFolderThatIsNotThere) {
 
     EXPECT_FALSE(writeFile(folder.file("none/a.fbx"), "content", status));
     EXPECT_TRUE(status.Error());
-    EXPECT_TRUE(filesIn(folder).empty());
+    EXPECT_TRUE(folder.files().empty());
 }
 
 TEST(OutputFile, RefusesAFolderThatCannotBeWrittenTo) {
@@ -270,7 +250,7 @@ TEST(OutputFile, FailsWhenItsFolderVanishes) {
 
     EXPECT_FALSE(file.commit(status));
     EXPECT_TRUE(status.Error());
-    EXPECT_TRUE(filesIn(folder).empty());
+    EXPECT_TRUE(folder.files().empty());
 }
 
 TEST(OutputFile, FailsOnAMediumThatIsFull) {
@@ -298,7 +278,7 @@ TEST(OutputFile, FailsAtTheLargestSizeAFileMayHave) {
     EXPECT_FALSE(written);
     EXPECT_TRUE(status.Error());
     EXPECT_EQ(folder.read("a.fbx"), "old");
-    EXPECT_EQ(filesIn(folder).size(), 1U);
+    EXPECT_EQ(folder.files().size(), 1U);
 }
 
 TEST(OutputFile, SendsEverythingThroughAPipe) {
@@ -340,37 +320,6 @@ TEST(OutputFile, FailsWithoutASignalWhenAPipeBreaks) {
     EXPECT_NE(std::string(status.GetErrorString()).find("Broken pipe"), std::string::npos) << status.GetErrorString();
 }
 
-/// Fails at the operation whose turn it is.
-class FailingOperations final : public FileOperations {
-public:
-    explicit FailingOperations(int failAt) : mFailAt(failAt) {}
-
-    int create(const std::string& path, unsigned permissions, int& file) override {
-        return fails() ? EIO : FileOperations::create(path, permissions, file);
-    }
-    int write(int file, std::span<const char> bytes) override {
-        return fails() ? ENOSPC : FileOperations::write(file, bytes);
-    }
-    int writeAt(int file, std::uint64_t offset, std::span<const char> bytes) override {
-        return fails() ? EIO : FileOperations::writeAt(file, offset, bytes);
-    }
-    int flush(int file) override { return fails() ? EIO : FileOperations::flush(file); }
-    int close(int file) override {
-        const int error = FileOperations::close(file);
-        return fails() ? EIO : error;
-    }
-    int rename(const std::string& from, const std::string& to) override {
-        return fails() ? EACCES : FileOperations::rename(from, to);
-    }
-    [[nodiscard]] int calls() const { return mCalls; }
-
-private:
-    bool fails() { return mCalls++ == mFailAt; }
-
-    int mFailAt;
-    int mCalls = 0;
-};
-
 bool writeLargeFile(const std::string& name, FileOperations& operations, FbxStatus& status) {
     OutputFile file(name, operations);
     if (!file.open(status)) {
@@ -402,8 +351,161 @@ TEST(OutputFile, SurvivesAFaultInEverySingleOperation) {
         EXPECT_TRUE(status.Error()) << failAt;
         EXPECT_NE(std::string(status.GetErrorString()).find("a.fbx"), std::string::npos) << failAt;
         EXPECT_EQ(folder.read("a.fbx"), "old") << failAt;
-        EXPECT_EQ(filesIn(folder).size(), 1U) << failAt;
+        EXPECT_EQ(folder.files().size(), 1U) << failAt;
     }
+}
+
+TEST(OutputFile, ExtendsWithZeros) {
+    const TemporaryFolder folder;
+    FbxStatus status;
+    OutputFile file(folder.file("a.fbx"));
+    ASSERT_TRUE(file.open(status));
+    std::string expected;
+
+    for (const std::size_t size : {3U, 2U, 7U, (1U << 18) + 7, (1U << 20), (1U << 20) + 1}) {
+        file.write(span("x"));
+        expected += 'x';
+        file.extend(size);
+        expected.resize(std::max(size, expected.size()));
+        EXPECT_EQ(file.size(), expected.size());
+        file.overwrite(expected.size() / 2, span("y"));
+        expected[expected.size() / 2] = 'y';
+    }
+
+    ASSERT_TRUE(file.commit(status)) << status.GetErrorString();
+    EXPECT_TRUE(folder.read("a.fbx") == expected);
+}
+
+TEST(OutputFile, ExtendsBeyondWhatFitsInMemoryOrOnTheMedium) {
+    const TemporaryFolder folder;
+    constexpr std::uint64_t kSize = std::uint64_t{1} << 36U;
+    FbxStatus status;
+    OutputFile file(folder.file("a.fbx"));
+    ASSERT_TRUE(file.open(status));
+
+    file.extend(kSize);
+
+    EXPECT_TRUE(file.commit(status)) << status.GetErrorString();
+    EXPECT_EQ(fs::file_size(folder.file("a.fbx")), kSize);
+}
+
+/// Keeps the largest number of bytes that are handed over at once.
+class MeasuringOperations final : public FileOperations {
+public:
+    int write(int file, std::span<const char> bytes) override {
+        mLargest = std::max(mLargest, bytes.size());
+        return FileOperations::write(file, bytes);
+    }
+    [[nodiscard]] std::size_t largest() const { return mLargest; }
+
+private:
+    std::size_t mLargest = 0;
+};
+
+TEST(OutputFile, DoesNotGatherInMemoryWhatAPipeGets) {
+    const TemporaryFolder folder;
+    const std::string pipe = folder.file("pipe");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+    std::string received;
+    std::thread reader([&] { received = folder.read("pipe"); });
+    FbxStatus status;
+    MeasuringOperations operations;
+    OutputFile file(pipe, operations);
+    ASSERT_TRUE(file.open(status));
+    std::string expected;
+    for (char c = 'a'; c <= 'z'; ++c) {
+        file.write(span(std::string(100003, c)));
+        expected.append(100003, c);
+    }
+    file.extend(expected.size() + (1 << 19));
+    expected.resize(expected.size() + (1 << 19));
+    file.overwrite(3, span("ABC"));
+    expected.replace(3, 3, "ABC");
+
+    EXPECT_TRUE(file.commit(status)) << status.GetErrorString();
+
+    reader.join();
+    EXPECT_TRUE(received == expected);
+    EXPECT_LE(operations.largest(), std::size_t{1} << 18);
+}
+
+// ---- Files that belong together ----
+
+bool writePair(const TemporaryFolder& folder, FbxStatus& status, FileOperations& operations) {
+    OutputFile first(folder.file("first"), operations), second(folder.file("second"), operations);
+    if (!first.open(status) || !second.open(status)) {
+        return false;
+    }
+    first.write(span("new first"));
+    second.write(span("new second"));
+    OutputFile* const both[] = {&first, &second};
+    return OutputFile::commitTogether(both, status);
+}
+
+TEST(OutputFilesTogether, AllAppear) {
+    const TemporaryFolder folder;
+    folder.write("second", "old");
+    FbxStatus status;
+
+    EXPECT_TRUE(writePair(folder, status, systemFileOperations())) << status.GetErrorString();
+    EXPECT_TRUE(writePair(folder, status, systemFileOperations())) << status.GetErrorString();
+
+    EXPECT_EQ(folder.read("first"), "new first");
+    EXPECT_EQ(folder.read("second"), "new second");
+    EXPECT_EQ(folder.files(), (std::vector<std::string>{"first", "second"}));
+}
+
+TEST(OutputFilesTogether, SurviveAFaultInEverySingleOperation) {
+    for (const bool replacing : {false, true}) {
+        const TemporaryFolder folder;
+        FbxStatus status;
+        const auto restore = [&] {
+            for (const char* name : {"first", "second"}) {
+                fs::remove(folder.file(name));
+                if (replacing) {
+                    folder.write(name, std::string("old ") + name);
+                }
+            }
+        };
+        restore();
+        const std::vector<std::string> before = folder.files();
+        FailingOperations none(-1);
+        ASSERT_TRUE(writePair(folder, status, none));
+        ASSERT_GE(none.calls(), 11); // create, write, flush, close and rename each, and a link
+
+        for (int failAt = 0; failAt < none.calls(); ++failAt) {
+            restore();
+            FailingOperations operations(failAt);
+            status.Clear();
+
+            EXPECT_FALSE(writePair(folder, status, operations)) << failAt;
+
+            EXPECT_TRUE(status.Error()) << failAt;
+            EXPECT_EQ(folder.files(), before) << failAt;
+            if (replacing) {
+                EXPECT_EQ(folder.read("first"), "old first") << failAt;
+                EXPECT_EQ(folder.read("second"), "old second") << failAt;
+            }
+        }
+    }
+}
+
+/// A file system on which a file has one name.
+class WithoutLinks final : public FileOperations {
+public:
+    int link(const std::string&, const std::string&) override { return EPERM; }
+};
+
+TEST(OutputFilesTogether, AppearWhereThereAreNoLinks) {
+    const TemporaryFolder folder;
+    folder.write("first", "old");
+    FbxStatus status;
+    WithoutLinks operations;
+
+    EXPECT_TRUE(writePair(folder, status, operations)) << status.GetErrorString();
+
+    EXPECT_EQ(folder.read("first"), "new first");
+    EXPECT_EQ(folder.files(), (std::vector<std::string>{"first", "second"}));
 }
 
 TEST(OutputFile, TakesAnotherNameWhenSomebodyElseWritesInTheFolder) {
@@ -419,7 +521,7 @@ TEST(OutputFile, TakesAnotherNameWhenSomebodyElseWritesInTheFolder) {
     EXPECT_TRUE(second.commit(status));
 
     EXPECT_EQ(folder.read("a.fbx"), "second");
-    EXPECT_EQ(filesIn(folder).size(), 1U);
+    EXPECT_EQ(folder.files().size(), 1U);
 }
 
 } // namespace

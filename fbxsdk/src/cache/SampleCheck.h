@@ -1,0 +1,30 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Whether numbers can stand in a point cache.
+#pragma once
+
+#include <cmath>
+#include <limits>
+#include <span>
+
+#include <fbxsdk/FbxArch.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// Null, or why the points of a sample cannot be written, as floats or as they are. What is no number would spread in
+/// every program that reads the cache.
+[[nodiscard]] inline const char* sampleFault(std::span<const double> points, bool asFloats) {
+    constexpr auto kMostFloat = static_cast<double>(std::numeric_limits<float>::max());
+    for (const double value : points) {
+        if (!std::isfinite(value))
+            return "a sample with points that are not finite";
+        if (asFloats && std::abs(value) > kMostFloat)
+            return "a sample with points beyond what a float can hold";
+    }
+    return nullptr;
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END
