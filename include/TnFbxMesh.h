@@ -11,6 +11,10 @@
 
 namespace Tarnell::Fbx {
 
+namespace detail {
+class MeshArrays;
+}
+
 /// A polygon mesh.
 ///
 /// Polygons are runs of polygon vertices, one after the other; each polygon vertex names a control point and carries a
@@ -87,6 +91,8 @@ public:
     int getNumberOfControlPointSets() const;
 
 private:
+    friend class detail::MeshArrays;
+
     struct Vector {
         float x, y, z;
     };

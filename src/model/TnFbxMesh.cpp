@@ -4,6 +4,8 @@
 // The mesh: six arrays, two counts and three flags.
 #include "TnFbxMesh.h"
 
+#include "MeshArrays.h"
+
 #include <cstddef>
 
 namespace Tarnell::Fbx {
@@ -29,17 +31,6 @@ bool setElement(std::vector<Element>& array, int index, const Element& value) {
     }
     *element = value;
     return true;
-}
-
-/// Memory for exactly that many elements, without any.
-template <typename Element>
-void reserveExactly(std::vector<Element>& array, int count) {
-    array.reserve(static_cast<std::size_t>(count));
-}
-
-template <typename Element>
-void fill(std::vector<Element>& array, int count, const Element& value) {
-    array.assign(static_cast<std::size_t>(count), value);
 }
 
 template <typename Vector>
@@ -85,29 +76,7 @@ bool TnFbxMesh::initMesh() {
 bool TnFbxMesh::deleteMesh() { return initMesh(); }
 
 bool TnFbxMesh::allocateGeometryData(int numberOfPolygons, int numberOfControlPoints, int numberOfPolygonVertices) {
-    initMesh(); // kept: before the check, so that a failure leaves an empty mesh
-    if (numberOfPolygons < 1 || numberOfControlPoints < 1 || numberOfPolygonVertices < 1) {
-        return false;
-    }
-
-    // all memory is found before the first array is filled: when there is too little, the mesh is still empty
-    Geometry& g = mGeometry;
-    reserveExactly(g.polygonVertexSizes, numberOfPolygons);
-    reserveExactly(g.pointIndices, numberOfPolygonVertices);
-    reserveExactly(g.controlPoints, numberOfControlPoints);
-    reserveExactly(g.normals, numberOfPolygonVertices);
-    reserveExactly(g.uvs, numberOfPolygonVertices);
-    reserveExactly(g.colours, numberOfPolygonVertices);
-
-    fill(g.polygonVertexSizes, numberOfPolygons, 0);
-    fill(g.pointIndices, numberOfPolygonVertices, 0);
-    fill(g.controlPoints, numberOfControlPoints, {kDefaultMeshPX, kDefaultMeshPY, kDefaultMeshPZ});
-    fill(g.normals, numberOfPolygonVertices, {kDefaultMeshNX, kDefaultMeshNY, kDefaultMeshNZ});
-    fill(g.uvs, numberOfPolygonVertices, {kDefaultMeshU, kDefaultMeshV});
-    fill(g.colours, numberOfPolygonVertices, {kDefaultMeshRed, kDefaultMeshGreen, kDefaultMeshBlue, kDefaultMeshAlpha});
-    g.controlPointCount = numberOfControlPoints;
-    g.controlPointSetCount = 1;
-    return true;
+    return detail::MeshArrays(*this).allocate(numberOfPolygons, numberOfControlPoints, numberOfPolygonVertices);
 }
 
 bool TnFbxMesh::addControlPoint(float x, float y, float z) {

@@ -10,49 +10,27 @@ namespace Tarnell::Fbx::detail {
 
 using Element = fbxsdk::FbxLayerElement;
 
-// ---- Normals ----
+// ---- Normals and texture coordinates ----
 
-LayerNormals::LayerNormals(fbxsdk::FbxMesh& mesh, fbxsdk::FbxLayer& layer) : mMesh(mesh) {
-    if (const fbxsdk::FbxLayerElementNormal* element = layer.GetNormals()) {
-        mMapping = element->GetMappingMode();
-        if (mMapping == Element::eByControlPoint) {
-            mByControlPoint = ElementValues<fbxsdk::FbxVector4>(*element);
-        }
+CornerValues<fbxsdk::FbxVector4> layerNormals(fbxsdk::FbxLayer& layer) {
+    const fbxsdk::FbxLayerElementNormal* element = layer.GetNormals();
+    const Element::EMappingMode mapping = element != nullptr ? element->GetMappingMode() : Element::eNone;
+    if (mapping == Element::eByControlPoint) {
+        return {mapping, ElementValues<fbxsdk::FbxVector4>(*element)};
     }
+    if (mapping == Element::eByPolygonVertex) { // kept: here an index alone leads to a normal
+        return {mapping, ElementValues<fbxsdk::FbxVector4>::numbered(*element)};
+    }
+    return {};
 }
 
-std::optional<fbxsdk::FbxVector4> LayerNormals::at(const Corner& corner) const {
-    if (mMapping == Element::eByControlPoint) {
-        return mByControlPoint.at(corner.controlPoint);
-    }
-    fbxsdk::FbxVector4 normal;
-    if (mMapping == Element::eByPolygonVertex && mMesh.GetPolygonVertexNormal(corner.polygon, corner.vertex, normal)) {
-        return normal;
-    }
-    return std::nullopt;
-}
-
-// ---- Texture coordinates ----
-
-LayerUVs::LayerUVs(fbxsdk::FbxMesh& mesh, fbxsdk::FbxLayer& layer) : mMesh(mesh) {
+CornerValues<fbxsdk::FbxVector2> layerUVs(fbxsdk::FbxLayer& layer) {
     const fbxsdk::FbxLayerElementUV* element = layer.GetUVs(Element::eTextureDiffuse);
-    if (element == nullptr) {
-        return;
+    const Element::EMappingMode mapping = element != nullptr ? element->GetMappingMode() : Element::eNone;
+    if (mapping == Element::eByControlPoint || mapping == Element::eByPolygonVertex) {
+        return {mapping, ElementValues<fbxsdk::FbxVector2>(*element)};
     }
-    mMapping = element->GetMappingMode();
-    if (mMapping == Element::eByControlPoint || mMapping == Element::eByPolygonVertex) {
-        mValues = ElementValues<fbxsdk::FbxVector2>(*element);
-    }
-}
-
-std::optional<fbxsdk::FbxVector2> LayerUVs::at(const Corner& corner) const {
-    if (mMapping == Element::eByControlPoint) {
-        return mValues.at(corner.controlPoint);
-    }
-    if (mMapping == Element::eByPolygonVertex) {
-        return mValues.directAt(mMesh.GetTextureUVIndex(corner.polygon, corner.vertex, Element::eTextureDiffuse));
-    }
-    return std::nullopt;
+    return {};
 }
 
 // ---- Colours ----
@@ -100,6 +78,11 @@ LayerColours::LayerColours(fbxsdk::FbxLayer& layer, const std::vector<std::optio
             mMaterialIndex = &material->GetIndexArray();
         }
     }
+}
+
+bool LayerColours::hasAny() const {
+    return mMapping == Element::eByControlPoint || mMapping == Element::eByPolygonVertex ||
+           (mFromMaterials && mMapping == Element::eByPolygon);
 }
 
 std::optional<Colour> LayerColours::at(const Corner& corner) const {

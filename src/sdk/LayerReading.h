@@ -15,7 +15,6 @@ namespace Tarnell::Fbx::detail {
 /// One vertex of one polygon.
 struct Corner {
     int polygon;
-    int vertex;        // in the polygon
     int polygonVertex; // in the mesh
     int controlPoint;  // −1 or any number in a damaged file
 };
@@ -24,7 +23,8 @@ struct Colour {
     float red, green, blue, alpha;
 };
 
-/// The values of a layer element by index, as its reference mode has it.
+/// The values of a layer element by index, as its reference mode has it. They are asked for one by one: values that
+/// still stand in a file need not be in memory all at once for that.
 template <class Value>
 class ElementValues {
 public:
@@ -46,6 +46,16 @@ public:
         }
     }
 
+    /// Values that are numbered all the same where the element has indices only.
+    static ElementValues numbered(const fbxsdk::FbxLayerElementTemplate<Value>& element) {
+        ElementValues values;
+        values.mDirect = &element.GetDirectArray();
+        if (element.GetReferenceMode() != fbxsdk::FbxLayerElement::eDirect) {
+            values.mIndex = &element.GetIndexArray();
+        }
+        return values;
+    }
+
     std::optional<Value> at(int position) const {
         if (mIndex != nullptr) {
             if (position < 0 || position >= mIndex->GetCount()) {
@@ -59,42 +69,33 @@ public:
         return mDirect->GetAt(position);
     }
 
-    /// The direct array alone, whatever the index array says.
-    std::optional<Value> directAt(int position) const {
-        if (mDirect == nullptr || position < 0 || position >= mDirect->GetCount()) {
-            return std::nullopt;
-        }
-        return mDirect->GetAt(position);
-    }
-
 private:
     const fbxsdk::FbxLayerElementArrayTemplate<Value>* mDirect = nullptr;
     const fbxsdk::FbxLayerElementArrayTemplate<int>* mIndex = nullptr;
 };
 
-/// The normals of a layer. kept: mappings by polygon and all-same are not read.
-class LayerNormals {
+/// The values of an element that is mapped by control point or by polygon vertex; nothing of any other.
+template <class Value>
+class CornerValues {
 public:
-    LayerNormals(fbxsdk::FbxMesh& mesh, fbxsdk::FbxLayer& layer);
-    std::optional<fbxsdk::FbxVector4> at(const Corner& corner) const;
+    CornerValues() = default;
+    CornerValues(fbxsdk::FbxLayerElement::EMappingMode mapping, const ElementValues<Value>& values)
+        : mByControlPoint(mapping == fbxsdk::FbxLayerElement::eByControlPoint), mValues(values) {}
+
+    std::optional<Value> at(const Corner& corner) const {
+        return mValues.at(mByControlPoint ? corner.controlPoint : corner.polygonVertex);
+    }
 
 private:
-    fbxsdk::FbxMesh& mMesh;
-    fbxsdk::FbxLayerElement::EMappingMode mMapping = fbxsdk::FbxLayerElement::eNone;
-    ElementValues<fbxsdk::FbxVector4> mByControlPoint;
+    bool mByControlPoint = false;
+    ElementValues<Value> mValues;
 };
+
+/// The normals of a layer. kept: mappings by polygon and all-same are not read.
+CornerValues<fbxsdk::FbxVector4> layerNormals(fbxsdk::FbxLayer& layer);
 
 /// The diffuse texture coordinates of a layer.
-class LayerUVs {
-public:
-    LayerUVs(fbxsdk::FbxMesh& mesh, fbxsdk::FbxLayer& layer);
-    std::optional<fbxsdk::FbxVector2> at(const Corner& corner) const;
-
-private:
-    fbxsdk::FbxMesh& mMesh;
-    fbxsdk::FbxLayerElement::EMappingMode mMapping = fbxsdk::FbxLayerElement::eNone;
-    ElementValues<fbxsdk::FbxVector2> mValues;
-};
+CornerValues<fbxsdk::FbxVector2> layerUVs(fbxsdk::FbxLayer& layer);
 
 /// The materials of the node a mesh stands on, as colours: nothing for a missing one, `otherwise` for a material that
 /// has no diffuse colour.
@@ -104,6 +105,8 @@ std::vector<std::optional<Colour>> materialColours(const fbxsdk::FbxMesh& mesh, 
 class LayerColours {
 public:
     LayerColours(fbxsdk::FbxLayer& layer, const std::vector<std::optional<Colour>>& materials);
+    /// Whether any corner can have one.
+    bool hasAny() const;
     std::optional<Colour> at(const Corner& corner) const;
 
 private:

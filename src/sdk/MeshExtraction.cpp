@@ -8,6 +8,8 @@
 #include "LayerReading.h"
 #include "PropertySampling.h"
 
+#include "model/MeshArrays.h"
+
 #include <array>
 #include <limits>
 #include <memory>
@@ -18,6 +20,7 @@ namespace Tarnell::Fbx {
 using detail::channelAfter;
 using detail::Corner;
 using detail::fail;
+using detail::MeshArrays;
 using detail::succeed;
 using detail::toFloat;
 
@@ -74,47 +77,51 @@ void forEachCorner(const fbxsdk::FbxMesh& source, Visit&& visit) {
         const int start = source.GetPolygonVertexIndex(polygon);
         for (int vertex = 0; vertex < size; ++vertex) {
             const int controlPoint = vertices != nullptr && start >= 0 ? vertices[start + vertex] : -1;
-            visit(Corner{polygon, vertex, polygonVertex++, controlPoint});
+            visit(Corner{polygon, polygonVertex++, controlPoint});
         }
     }
 }
 
-void fillLayout(const fbxsdk::FbxMesh& source, TnFbxMesh& mesh) {
+void fillLayout(const fbxsdk::FbxMesh& source, MeshArrays& arrays) {
+    int* const sizes = arrays.polygonVertexSizes();
     for (int polygon = 0; polygon < source.GetPolygonCount(); ++polygon) {
-        mesh.setPolygonVertexSize(polygon, source.GetPolygonSize(polygon));
+        sizes[polygon] = source.GetPolygonSize(polygon);
     }
-    forEachCorner(source,
-                  [&mesh](const Corner& corner) { mesh.setPointIndex(corner.polygonVertex, corner.controlPoint); });
+    int* const pointIndices = arrays.pointIndices();
+    forEachCorner(source, [&](const Corner& corner) { pointIndices[corner.polygonVertex] = corner.controlPoint; });
 }
 
 /// The normals of a layer; whether it has any.
-bool fillNormals(fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh) {
-    const detail::LayerNormals normals(source, layer);
+bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const fbxsdk::FbxAMatrix* bake,
+                 MeshArrays& arrays) {
+    const detail::CornerValues<fbxsdk::FbxVector4> stored = detail::layerNormals(layer);
     const fbxsdk::FbxVector4 missing(static_cast<double>(TnFbxMesh::kDefaultMeshNX),
                                      static_cast<double>(TnFbxMesh::kDefaultMeshNY),
                                      static_cast<double>(TnFbxMesh::kDefaultMeshNZ));
+    auto* const normals = arrays.normals();
     bool found = false;
     forEachCorner(source, [&](const Corner& corner) {
-        const std::optional<fbxsdk::FbxVector4> stored = normals.at(corner);
-        found = found || stored.has_value();
-        fbxsdk::FbxVector4 normal = stored.value_or(missing);
+        const std::optional<fbxsdk::FbxVector4> value = stored.at(corner);
+        found = found || value.has_value();
+        fbxsdk::FbxVector4 normal = value.value_or(missing);
         if (bake != nullptr) {
             normal = bake->MultT(normal);
         }
-        mesh.setNormal(corner.polygonVertex, toFloat(normal[0]), toFloat(normal[1]), toFloat(normal[2]));
+        normals[corner.polygonVertex] = {toFloat(normal[0]), toFloat(normal[1]), toFloat(normal[2])};
     });
     return found;
 }
 
 /// The texture coordinates of a layer; whether it has any.
-bool fillUVs(fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, TnFbxMesh& mesh) {
-    const detail::LayerUVs uvs(source, layer);
+bool fillUVs(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, MeshArrays& arrays) {
+    const detail::CornerValues<fbxsdk::FbxVector2> stored = detail::layerUVs(layer);
+    auto* const uvs = arrays.uvs();
     bool found = false;
     forEachCorner(source, [&](const Corner& corner) {
-        const std::optional<fbxsdk::FbxVector2> uv = uvs.at(corner);
-        found = found || uv.has_value();
-        mesh.setUV(corner.polygonVertex, uv ? toFloat((*uv)[0]) : TnFbxMesh::kDefaultMeshU,
-                   uv ? toFloat((*uv)[1]) : TnFbxMesh::kDefaultMeshV);
+        if (const std::optional<fbxsdk::FbxVector2> uv = stored.at(corner)) {
+            found = true;
+            uvs[corner.polygonVertex] = {toFloat((*uv)[0]), toFloat((*uv)[1])};
+        }
     });
     return found;
 }
@@ -125,7 +132,7 @@ constexpr detail::Colour kDefaultColour = {TnFbxMesh::kDefaultMeshRed, TnFbxMesh
 /// The colours of all layers; whether any has some.
 ///
 /// kept: every layer overwrites the ones before it, so the last layer decides, also where it has no colour.
-bool fillColours(fbxsdk::FbxMesh& source, TnFbxMesh& mesh) {
+bool fillColours(fbxsdk::FbxMesh& source, MeshArrays& arrays) {
     const auto materials = detail::materialColours(source, kDefaultColour);
     bool found = false;
     for (int i = 0; i < source.GetLayerCount(); ++i) {
@@ -134,11 +141,15 @@ bool fillColours(fbxsdk::FbxMesh& source, TnFbxMesh& mesh) {
             continue;
         }
         const detail::LayerColours colours(*layer, materials);
+        if (!found && !colours.hasAny()) {
+            continue; // the defaults will do
+        }
+        auto* const target = arrays.colours();
         forEachCorner(source, [&](const Corner& corner) {
             const std::optional<detail::Colour> stored = colours.at(corner);
             found = found || stored.has_value();
             const detail::Colour colour = stored.value_or(kDefaultColour);
-            mesh.setColour(corner.polygonVertex, colour.red, colour.green, colour.blue, colour.alpha);
+            target[corner.polygonVertex] = {colour.red, colour.green, colour.blue, colour.alpha};
         });
     }
     return found;
@@ -160,19 +171,19 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
     const fbxsdk::FbxAMatrix* pointBake = transformPoints ? &bake.points : nullptr;
     const fbxsdk::FbxAMatrix* normalBake = transformPoints ? &bake.normals : nullptr;
 
+    MeshArrays arrays(mesh);
     const std::int64_t cornerCount = polygonVertexCount(*source);
     if (cornerCount > std::numeric_limits<int>::max() ||
-        !mesh.allocateGeometryData(source->GetPolygonCount(), source->GetControlPointsCount(),
-                                   static_cast<int>(cornerCount))) {
+        !arrays.allocate(source->GetPolygonCount(), source->GetControlPointsCount(), static_cast<int>(cornerCount))) {
         return fail(std::string("the mesh of \"") + node->GetName() + "\" has no polygons or no points");
     }
     setControlPoints(time, *node, *source, pointBake, mesh);
-    fillLayout(*source, mesh);
+    fillLayout(*source, arrays);
     if (fbxsdk::FbxLayer* first = source->GetLayer(0)) {
-        mesh.setValidNormals(fillNormals(*source, *first, normalBake, mesh));
-        mesh.setValidUVs(fillUVs(*source, *first, mesh));
+        mesh.setValidNormals(fillNormals(*source, *first, normalBake, arrays));
+        mesh.setValidUVs(fillUVs(*source, *first, arrays));
     }
-    mesh.setValidColours(fillColours(*source, mesh));
+    mesh.setValidColours(fillColours(*source, arrays));
     return succeed();
 }
 
@@ -180,23 +191,25 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
 /// unset.
 void FbxSdk::setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& source,
                               const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh) {
-    const fbxsdk::FbxVector4* points = source.GetControlPoints();
     std::unique_ptr<fbxsdk::FbxVector4[]> deformed;
-    if (getDeformation(&source)) {
+    const bool isDeformed = getDeformation(&source);
+    if (isDeformed) {
         fbxsdk::FbxTime moment;
         moment.SetSecondDouble(static_cast<double>(time.getTime()));
         fbxsdk::FbxAMatrix identity;
         fbxsdk::FbxVector4* made = nullptr;
         getDeformedControlPoints(&node, &source, moment, identity, &made);
         deformed.reset(made);
-        points = made;
-    }
-    if (points == nullptr) {
-        return;
+        if (made == nullptr) {
+            return;
+        }
     }
     const int count = source.GetControlPointsCount();
     for (int i = 0; i < count; ++i) {
-        const fbxsdk::FbxVector4 point = bake != nullptr ? bake->MultT(points[i]) : points[i];
+        // One by one: of points that still stand in a file there need be no list in memory.
+        const fbxsdk::FbxVector4 stored =
+            isDeformed ? deformed[static_cast<std::size_t>(i)] : source.GetControlPointAt(i);
+        const fbxsdk::FbxVector4 point = bake != nullptr ? bake->MultT(stored) : stored;
         mesh.setControlPoint(i, toFloat(point[0]), toFloat(point[1]), toFloat(point[2]));
     }
 }

@@ -38,14 +38,14 @@ void PropertySampler::collectCurves(const fbxsdk::FbxProperty& property, const c
     const fbxsdk::FbxString name = property.GetName();
     for (fbxsdk::FbxAnimLayer* layer : mLayers) {
         if (fbxsdk::FbxAnimCurve* curve = animated.GetCurve(layer, name, component, /*pCreate*/ false)) {
-            mCurves.push_back(curve);
+            mCurves.push_back({curve, 0});
         }
     }
 }
 
 detail::SampleRange PropertySampler::keyedRange() const {
     SampleRange range;
-    for (fbxsdk::FbxAnimCurve* curve : mCurves) {
+    for (const auto& [curve, lastKey] : mCurves) {
         const int keyCount = curve->KeyGetCount();
         if (keyCount < 1) {
             continue;
@@ -62,12 +62,22 @@ detail::SampleRange PropertySampler::keyedRange() const {
 }
 
 // kept: seconds are counted at the scene's rate also when the frames were converted to another one
-float PropertySampler::valueAt(std::int64_t frame) const {
-    fbxsdk::FbxTime time;
-    time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(mRate));
+void PropertySampler::setMoments(std::int64_t first, std::int64_t count) {
+    if (mFirstFrame == first && static_cast<std::int64_t>(mMoments.size()) == count) {
+        return;
+    }
+    mMoments.clear();
+    mMoments.resize(static_cast<std::size_t>(count));
+    mFirstFrame = first;
+    for (fbxsdk::FbxTime& moment : mMoments) {
+        moment.SetSecondDouble(static_cast<double>(first++) / static_cast<double>(mRate));
+    }
+}
+
+float PropertySampler::valueAt(const fbxsdk::FbxTime& moment) {
     float value = 0.0f;
-    for (fbxsdk::FbxAnimCurve* curve : mCurves) {
-        value += curve->Evaluate(time);
+    for (auto& [curve, lastKey] : mCurves) {
+        value += curve->Evaluate(moment, &lastKey);
     }
     return value;
 }
@@ -87,9 +97,10 @@ bool PropertySampler::sample(const fbxsdk::FbxProperty& property, const char* co
         if (!takeSamples(mSamplesLeft, count, /*channelCount*/ 1)) {
             return false;
         }
+        setMoments(range.first, count);
         mSamples.reserve(static_cast<std::size_t>(count));
-        for (std::int64_t frame = range.first; frame <= range.last; ++frame) {
-            mSamples.push_back(valueAt(frame));
+        for (const fbxsdk::FbxTime& moment : mMoments) {
+            mSamples.push_back(valueAt(moment));
         }
     }
     mTime.setTime(0.0f, range.first, range.last, keyed ? mRate : 0.0f);

@@ -85,7 +85,8 @@ public:
 private:
     void collectCurves(const fbxsdk::FbxProperty& property, const char* component);
     SampleRange keyedRange() const;
-    float valueAt(std::int64_t frame) const;
+    void setMoments(std::int64_t first, std::int64_t count);
+    float valueAt(const fbxsdk::FbxTime& moment);
 
     std::vector<fbxsdk::FbxAnimLayer*> mLayers;
     fbxsdk::FbxTime::EMode mTimeMode;
@@ -95,7 +96,15 @@ private:
     float mSampleRate;
     std::int64_t& mSamplesLeft;
 
-    std::vector<fbxsdk::FbxAnimCurve*> mCurves; // of the component being sampled, with and without keys
+    /// A curve, and where it was evaluated last: the next sample is not far.
+    struct SampledCurve {
+        fbxsdk::FbxAnimCurve* curve;
+        int lastKey;
+    };
+
+    std::vector<SampledCurve> mCurves;     // of the component being sampled, with and without keys
+    std::vector<fbxsdk::FbxTime> mMoments; // one per frame; all curves of a read mostly have the same
+    std::int64_t mFirstFrame = 0;          // of the moments
     TnFbxTime mTime;
     std::vector<float> mSamples;
 };

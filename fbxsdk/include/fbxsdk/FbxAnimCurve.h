@@ -12,8 +12,9 @@
 FBXSDK_NAMESPACE_BEGIN
 
 namespace detail {
+struct CurveCursor;
 struct CurveKeys;
-}
+} // namespace detail
 
 struct FBXSDK_DLL FbxAnimCurveDef {
     static constexpr float sDEFAULT_WEIGHT = 1.0F / 3.0F;
@@ -168,6 +169,7 @@ public:
 
 private:
     std::unique_ptr<detail::CurveKeys> mKeys;
+    std::unique_ptr<detail::CurveCursor> mCursor;
 };
 
 FBXSDK_NAMESPACE_END

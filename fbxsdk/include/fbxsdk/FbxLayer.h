@@ -102,7 +102,9 @@ public:
     }
     void SetLast(T const& pItem) { SetAt(GetCount() - 1, pItem); }
 
-    [[nodiscard]] T GetAt(int pIndex) const { return mItems.contains(pIndex) ? mItems[pIndex] : detail::zeroItem<T>(); }
+    [[nodiscard]] T GetAt(int pIndex) const {
+        return mItems.contains(pIndex) ? mItems.value(pIndex) : detail::zeroItem<T>();
+    }
     [[nodiscard]] T GetFirst() const { return GetAt(0); }
     [[nodiscard]] T GetLast() const { return GetAt(GetCount() - 1); }
     /// The removed item; a zero item when there is none at the index.
@@ -128,7 +130,7 @@ public:
     void CopyTo(FbxArray<T>& pArray) const {
         pArray.Resize(GetCount());
         for (int i = 0; i < GetCount(); ++i)
-            pArray[i] = mItems[i];
+            pArray[i] = mItems.value(i);
     }
 
     /// Unlike elsewhere the index must be in range.

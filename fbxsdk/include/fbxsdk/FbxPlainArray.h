@@ -2,22 +2,62 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The memory behind geometry: contiguous items of plain types that can grow without being initialised, so that a file's
-// numbers are decoded straight into place.
+// numbers are decoded straight into place. Items that a file holds just as they are, compressed or not, stay there as
+// long as only their values are asked for.
 #pragma once
 
 #include <algorithm>
 #include <cstddef>
+#include <cstring>
+#include <memory>
 #include <type_traits>
+#include <utility>
 
-#include <fbxsdk/FbxArch.h>
+#include <fbxsdk/FbxVector4.h>
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+class StoredBytes;
+
+/// How many bytes of an item a file has; the others are those of a new item.
+template <class T>
+inline constexpr std::size_t kStoredBytes = sizeof(T);
+template <>
+inline constexpr std::size_t kStoredBytes<FbxVector4> = 3 * sizeof(double);
+
+/// Items of a file, packed. Whoever reads them more or less in order sees them through a window that moves along, and
+/// what lies before it takes no memory any more.
+class FBXSDK_DLL StoredItems {
+public:
+    StoredItems(std::unique_ptr<StoredBytes> pSource, int pCount, std::size_t pItemBytes);
+    StoredItems(const StoredItems&) = delete;
+    StoredItems& operator=(const StoredItems&) = delete;
+    ~StoredItems();
+
+    /// The bytes of an item that exists.
+    [[nodiscard]] const char* at(int pIndex, std::size_t pItemBytes) {
+        if (static_cast<unsigned>(pIndex - mWindowStart) >= static_cast<unsigned>(mWindowSize))
+            moveWindow(pIndex);
+        return mBytes + static_cast<std::size_t>(pIndex) * pItemBytes;
+    }
+
+private:
+    void moveWindow(int pIndex);
+    void releaseUpTo(int pEnd);
+
+    std::unique_ptr<StoredBytes> mSource;
+    const char* mBytes;
+    std::size_t mItemBytes;
+    int mCount;
+    int mWindowStart = 0;
+    int mWindowSize = 0;
+};
+
 /// Items of one size, given with every call; knows nothing of their type.
 class FBXSDK_DLL PlainStorage {
 public:
-    PlainStorage() = default;
+    PlainStorage();
     PlainStorage(const PlainStorage&) = delete;
     PlainStorage& operator=(const PlainStorage&) = delete;
     ~PlainStorage();
@@ -27,6 +67,15 @@ public:
 
 protected:
     [[nodiscard]] void* items() const { return mItems; }
+    /// Whether the items still stand in a file; there is no other memory behind them then.
+    [[nodiscard]] bool isStored() const { return mStored != nullptr; }
+    [[nodiscard]] StoredItems& stored() const { return *mStored; }
+    /// Makes that many items of what a file holds. There must be no items yet.
+    void store(std::unique_ptr<StoredItems> pItems, int pCount);
+    /// The count remains, and memory for as many items has to be written to.
+    [[nodiscard]] std::unique_ptr<StoredItems> takeStored(std::size_t pItemSize) const;
+    void forgetStored();
+
     /// Room for that many items. Throws std::bad_alloc when there is none; the items are untouched then.
     void reserveItems(int pCapacity, std::size_t pItemSize);
     /// New items hold whatever was there.
@@ -36,24 +85,46 @@ protected:
     void closeSlots(int pIndex, int pCount, std::size_t pItemSize);
 
 private:
-    void* mItems = nullptr;
+    void allocate(int pCapacity, std::size_t pItemSize) const;
+
+    // That items come out of the file is no change of the array.
+    mutable std::unique_ptr<StoredItems> mStored;
+    mutable void* mItems = nullptr;
+    mutable int mCapacity = 0;
     int mCount = 0;
-    int mCapacity = 0;
 };
 
-/// A growing array of a plain type. Negative counts mean none; indices are the caller's to check.
+/// A growing array of a plain type. Negative counts mean none; indices are the caller's to check. Whoever asks for more
+/// than values gets all items out of the file first.
 template <class T>
 class PlainArray : public PlainStorage {
     static_assert(std::is_trivially_copyable<T>::value, "items are moved as bytes");
 
 public:
-    [[nodiscard]] T* data() const { return static_cast<T*>(items()); }
+    [[nodiscard]] T* data() const {
+        ensureInMemory();
+        return static_cast<T*>(items());
+    }
+    [[nodiscard]] T value(int pIndex) const {
+        return isStored() ? storedItem(stored(), pIndex) : static_cast<const T*>(items())[pIndex];
+    }
     [[nodiscard]] T& operator[](int pIndex) const { return data()[pIndex]; }
     [[nodiscard]] T* begin() const { return data(); }
     [[nodiscard]] T* end() const { return data() + count(); }
 
-    void reserve(int pCapacity) { reserveItems(pCapacity, sizeof(T)); }
-    void resizeUninitialised(int pCount) { resizeItems(pCount, sizeof(T)); }
+    /// The items that a file's bytes are, kStoredBytes<T> each, in place of all that were there.
+    void keepStored(std::unique_ptr<StoredItems> pItems, int pCount) {
+        clear();
+        store(std::move(pItems), pCount);
+    }
+    void reserve(int pCapacity) {
+        ensureInMemory();
+        reserveItems(pCapacity, sizeof(T));
+    }
+    void resizeUninitialised(int pCount) {
+        ensureInMemory();
+        resizeItems(pCount, sizeof(T));
+    }
     void resize(int pCount, const T& pNewItem) {
         const T item = pNewItem; // it may be one of ours
         const int first = count();
@@ -63,14 +134,39 @@ public:
     }
     void add(const T& pItem) {
         const T item = pItem;
+        ensureInMemory();
         *static_cast<T*>(openSlot(count(), sizeof(T))) = item;
     }
     void insert(int pIndex, const T& pItem) {
         const T item = pItem;
+        ensureInMemory();
         *static_cast<T*>(openSlot(pIndex, sizeof(T))) = item;
     }
-    void remove(int pIndex, int pCount = 1) { closeSlots(pIndex, pCount, sizeof(T)); }
-    void clear() { resizeUninitialised(0); }
+    void remove(int pIndex, int pCount = 1) {
+        ensureInMemory();
+        closeSlots(pIndex, pCount, sizeof(T));
+    }
+    void clear() {
+        forgetStored();
+        resizeUninitialised(0);
+    }
+
+private:
+    static T storedItem(StoredItems& pItems, int pIndex) {
+        T item{};
+        std::memcpy(static_cast<void*>(&item), pItems.at(pIndex, kStoredBytes<T>), kStoredBytes<T>);
+        return item;
+    }
+    void ensureInMemory() const {
+        if (isStored())
+            readStored();
+    }
+    void readStored() const {
+        const std::unique_ptr<StoredItems> stored = takeStored(sizeof(T));
+        T* const to = static_cast<T*>(items());
+        for (int i = 0; i < count(); ++i)
+            to[i] = storedItem(*stored, i);
+    }
 };
 
 } // namespace detail

@@ -22,7 +22,8 @@ FbxAnimCurveBase::FbxAnimCurveBase(FbxManager& pManager, const detail::ClassInfo
 FbxAnimCurveBase::~FbxAnimCurveBase() = default;
 
 FbxAnimCurve::FbxAnimCurve(FbxManager& pManager, const detail::ClassInfo& pInfo)
-    : FbxAnimCurveBase(pManager, pInfo), mKeys(std::make_unique<detail::CurveKeys>()) {}
+    : FbxAnimCurveBase(pManager, pInfo), mKeys(std::make_unique<detail::CurveKeys>()),
+      mCursor(std::make_unique<detail::CurveCursor>()) {}
 FbxAnimCurve::~FbxAnimCurve() = default;
 
 FbxAnimCurve* FbxAnimCurve::Create(FbxScene* pContainer, const char* pName) {
@@ -73,6 +74,7 @@ bool isConstant(const detail::KeyAttributes& attributes) {
 
 detail::CurveKeys& FbxAnimCurve::editKeys() {
     ++GetFbxManager()->data().revision;
+    *mCursor = {};
     return *mKeys;
 }
 
@@ -133,10 +135,11 @@ void FbxAnimCurve::KeySetTime(int pKeyIndex, FbxTime pTime) {
 float FbxAnimCurve::Evaluate(FbxTime pTime, int* pLast) {
     if (mKeys->keyCount() == 0)
         return GetValue(0);
-    std::size_t hint = pLast && *pLast > 0 ? static_cast<std::size_t>(*pLast) : 0;
-    const float value = detail::evaluate(*mKeys, pTime.Get(), &hint);
     if (pLast)
-        *pLast = static_cast<int>(hint);
+        mCursor->segment = static_cast<std::size_t>(std::max(*pLast, 0));
+    const float value = detail::evaluate(*mKeys, pTime.Get(), mCursor.get());
+    if (pLast)
+        *pLast = static_cast<int>(mCursor->segment);
     return value;
 }
 

@@ -53,34 +53,47 @@ double parameterAt(double part, double right, double left) {
     return u;
 }
 
-double cubicValue(const CurveKeys& keys, std::size_t key, double part) {
+CubicSegment cubicSegment(const CurveKeys& keys, std::size_t key) {
+    CubicSegment segment;
+    segment.key = key;
+    segment.ticks = static_cast<double>(ticksBetween(keys.times[key], keys.times[key + 1]));
+    segment.right = rightWeight(keys, key);
+    segment.left = leftWeight(keys, key + 1);
     const double seconds = secondsBetween(keys.times[key], keys.times[key + 1]);
-    const double right = rightWeight(keys, key);
-    const double left = leftWeight(keys, key + 1);
     const double start = valueOf(keys, key);
     const double end = valueOf(keys, key + 1);
-    const double parameter = right == kEqualWeight && left == kEqualWeight ? part : parameterAt(part, right, left);
-    return bezier(start, start + rightSlope(keys, key) * right * seconds,
-                  end - leftSlope(keys, key + 1) * left * seconds, end, parameter);
+    segment.values = {start, start + rightSlope(keys, key) * segment.right * seconds,
+                      end - leftSlope(keys, key + 1) * segment.left * seconds, end};
+    return segment;
+}
+
+double cubicValue(const CubicSegment& segment, double passed) {
+    const double part = passed / segment.ticks;
+    const bool plain = segment.right == kEqualWeight && segment.left == kEqualWeight;
+    const auto& [start, startHandle, endHandle, end] = segment.values;
+    return bezier(start, startHandle, endHandle, end, plain ? part : parameterAt(part, segment.right, segment.left));
 }
 
 /// The value strictly between a key and the next one.
-double segmentValue(const CurveKeys& keys, std::size_t key, std::int64_t ticks) {
+double segmentValue(const CurveKeys& keys, std::size_t key, std::int64_t ticks, CurveCursor& cursor) {
+    const double passed = static_cast<double>(ticksBetween(keys.times[key], ticks));
+    if (cursor.cubic.key == key) {
+        return cubicValue(cursor.cubic, passed);
+    }
     const double start = valueOf(keys, key);
     const double end = valueOf(keys, key + 1);
-    const double passed = static_cast<double>(ticksBetween(keys.times[key], ticks));
-    const double whole = static_cast<double>(ticksBetween(keys.times[key], keys.times[key + 1]));
     switch (interpolationOf(keys, key)) {
     case Interpolation::constant:
         return start;
     case Interpolation::constantNext:
         return end;
     case Interpolation::linear:
-        return start + (end - start) * passed / whole;
+        return start + (end - start) * passed / static_cast<double>(ticksBetween(keys.times[key], keys.times[key + 1]));
     case Interpolation::cubic:
         break;
     }
-    return cubicValue(keys, key, passed / whole);
+    cursor.cubic = cubicSegment(keys, key);
+    return cubicValue(cursor.cubic, passed);
 }
 
 /// Whether the time lies at or behind the key and before the next one.
@@ -91,8 +104,8 @@ bool isInSegment(const CurveKeys& keys, std::size_t key, std::int64_t ticks) {
 
 /// The last key at or before a time that lies within the keys. Samples mostly come in order: the segment of the last
 /// one and the segment after it are tried first.
-std::size_t segmentAt(const CurveKeys& keys, std::int64_t ticks, std::size_t* hint) {
-    const std::size_t guess = hint != nullptr ? *hint : 0;
+std::size_t segmentAt(const CurveKeys& keys, std::int64_t ticks, CurveCursor& cursor) {
+    const std::size_t guess = cursor.segment;
     std::size_t segment = guess;
     if (!isInSegment(keys, guess, ticks)) {
         segment = guess + 1;
@@ -103,16 +116,14 @@ std::size_t segmentAt(const CurveKeys& keys, std::int64_t ticks, std::size_t* hi
             segment = next == begin ? 0 : static_cast<std::size_t>(next - begin) - 1;
         }
     }
-    if (hint != nullptr) {
-        *hint = segment;
-    }
+    cursor.segment = segment;
     return segment;
 }
 
-double valueWithin(const CurveKeys& keys, std::int64_t ticks, std::size_t* hint) {
-    const std::size_t key = segmentAt(keys, ticks, hint);
+double valueWithin(const CurveKeys& keys, std::int64_t ticks, CurveCursor& cursor) {
+    const std::size_t key = segmentAt(keys, ticks, cursor);
     const bool between = key + 1 < keys.keyCount() && keys.times[key] < ticks && ticks < keys.times[key + 1];
-    return between ? segmentValue(keys, key, ticks) : valueOf(keys, key);
+    return between ? segmentValue(keys, key, ticks, cursor) : valueOf(keys, key);
 }
 
 enum class Side { before, after };
@@ -148,7 +159,7 @@ double valueAfterRepetitions(const CurveKeys& keys, const Extrapolation& extrapo
 }
 
 double repeatedValue(const CurveKeys& keys, const Extrapolation& extrapolation, std::int64_t ticks, Side side,
-                     std::size_t* hint) {
+                     CurveCursor& cursor) {
     const std::size_t lastKey = keys.keyCount() - 1;
     const std::int64_t first = keys.times[0];
     const std::uint64_t length = ticksBetween(first, keys.times[lastKey]);
@@ -160,7 +171,7 @@ double repeatedValue(const CurveKeys& keys, const Extrapolation& extrapolation, 
     const bool mirrored = extrapolation.type == ExtrapolationType::mirrorRepetition && repetition.number % 2 == 1;
     const std::uint64_t offset = mirrored ? length - repetition.offset : repetition.offset;
     const auto inside = static_cast<std::int64_t>(static_cast<std::uint64_t>(first) + offset);
-    const double value = valueWithin(keys, inside, hint);
+    const double value = valueWithin(keys, inside, cursor);
     if (extrapolation.type != ExtrapolationType::relativeRepetition) {
         return value;
     }
@@ -176,7 +187,7 @@ double keptSlopeValue(const CurveKeys& keys, std::int64_t ticks, Side side) {
     return valueOf(keys, last) + leftSlope(keys, last) * secondsBetween(keys.times[last], ticks);
 }
 
-double extrapolatedValue(const CurveKeys& keys, std::int64_t ticks, Side side, std::size_t* hint) {
+double extrapolatedValue(const CurveKeys& keys, std::int64_t ticks, Side side, CurveCursor& cursor) {
     const Extrapolation& extrapolation = side == Side::before ? keys.before : keys.after;
     const std::size_t last = keys.keyCount() - 1;
     const bool hasLength = keys.times[0] < keys.times[last];
@@ -186,14 +197,12 @@ double extrapolatedValue(const CurveKeys& keys, std::int64_t ticks, Side side, s
     case ExtrapolationType::repetition:
     case ExtrapolationType::mirrorRepetition:
     case ExtrapolationType::relativeRepetition:
-        return repeatedValue(keys, extrapolation, ticks, side, hint);
+        return repeatedValue(keys, extrapolation, ticks, side, cursor);
     case ExtrapolationType::constant:
         break;
     }
     return valueOf(keys, side == Side::before ? 0 : last);
 }
-
-constexpr KeyAttributes kDefaultAttributes;
 
 /// Drops the attributes that no key uses any more.
 void compactAttributes(CurveKeys& keys) {
@@ -215,11 +224,6 @@ void compactAttributes(CurveKeys& keys) {
 
 } // namespace
 
-const KeyAttributes& CurveKeys::attributesOf(std::size_t key) const {
-    const std::size_t index = key < attributeOfKey.size() ? attributeOfKey[key] : attributes.size();
-    return index < attributes.size() ? attributes[index] : kDefaultAttributes;
-}
-
 void CurveKeys::setAttributes(std::size_t key, const KeyAttributes& keyAttributes) {
     const bool hasBefore = key > 0 && key - 1 < attributeOfKey.size() && attributeOfKey[key - 1] < attributes.size();
     if (hasBefore && attributes[attributeOfKey[key - 1]] == keyAttributes) {
@@ -235,18 +239,20 @@ void CurveKeys::setAttributes(std::size_t key, const KeyAttributes& keyAttribute
     attributeOfKey[key] = static_cast<std::uint32_t>(attributes.size() - 1);
 }
 
-float evaluate(const CurveKeys& keys, std::int64_t ticks, std::size_t* hint) {
+float evaluate(const CurveKeys& keys, std::int64_t ticks, CurveCursor* cursor) {
+    CurveCursor once;
+    CurveCursor& used = cursor != nullptr ? *cursor : once;
     const std::size_t count = keys.keyCount();
     if (count == 0) {
         return keys.defaultValue;
     }
     if (ticks < keys.times[0]) {
-        return toFloat(extrapolatedValue(keys, ticks, Side::before, hint));
+        return toFloat(extrapolatedValue(keys, ticks, Side::before, used));
     }
     if (ticks > keys.times[count - 1]) {
-        return toFloat(extrapolatedValue(keys, ticks, Side::after, hint));
+        return toFloat(extrapolatedValue(keys, ticks, Side::after, used));
     }
-    return toFloat(valueWithin(keys, ticks, hint));
+    return toFloat(valueWithin(keys, ticks, used));
 }
 
 } // namespace detail

@@ -14,7 +14,16 @@ namespace detail {
 /// A segment is interpolated as its left key says. Flags that say nothing mean constant.
 enum class Interpolation { constant, constantNext, linear, cubic };
 
-[[nodiscard]] Interpolation interpolationOf(const CurveKeys& keys, std::size_t key);
+[[nodiscard]] inline Interpolation interpolationOf(const CurveKeys& keys, std::size_t key) {
+    const std::uint32_t flags = keys.attributesOf(key).flags;
+    if ((flags & KeyFlag::cubic) != 0) {
+        return Interpolation::cubic;
+    }
+    if ((flags & KeyFlag::linear) != 0) {
+        return Interpolation::linear;
+    }
+    return (flags & KeyFlag::constantNext) != 0 ? Interpolation::constantNext : Interpolation::constant;
+}
 
 /// With this weight on both sides a weighted cubic is the plain Hermite one.
 constexpr double kEqualWeight = 1.0 / 3.0;

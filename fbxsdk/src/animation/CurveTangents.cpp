@@ -239,17 +239,6 @@ double leftWeight(const CurveKeys& keys, std::size_t key) {
     return weighted ? usableWeight(attributes.data[KeyData::nextLeftWeight]) : kEqualWeight;
 }
 
-Interpolation interpolationOf(const CurveKeys& keys, std::size_t key) {
-    const std::uint32_t flags = keys.attributesOf(key).flags;
-    if ((flags & KeyFlag::cubic) != 0) {
-        return Interpolation::cubic;
-    }
-    if ((flags & KeyFlag::linear) != 0) {
-        return Interpolation::linear;
-    }
-    return (flags & KeyFlag::constantNext) != 0 ? Interpolation::constantNext : Interpolation::constant;
-}
-
 double rightSlope(const CurveKeys& keys, std::size_t key) {
     const bool cubic = interpolationOf(keys, key) == Interpolation::cubic;
     return finiteOrFlat(cubic ? cubicRightSlope(keys, key) : straightSlope(keys, key));

@@ -29,15 +29,25 @@ LayerRule ruleOf(std::string_view propertyName) {
     return LayerRule::sum;
 }
 
+LayerContribution contributionOf(FbxAnimLayer& layer, const FbxAnimCurveNode& curveNode, bool base) {
+    LayerContribution contribution;
+    contribution.layer = &layer;
+    contribution.base = base;
+    const unsigned int count = std::min(curveNode.GetChannelsCount(), 4U);
+    for (unsigned int i = 0; i < count; ++i) {
+        FbxAnimCurve* curve = curveNode.GetCurve(i);
+        contribution.curves[i] = curve && curve->KeyGetCount() > 0 ? curve : nullptr;
+        contribution.values[i] = curveNode.channelValue(i);
+    }
+    return contribution;
+}
+
 /// What the layer says for each component: its curve's value, or the channel's where it has none.
 Components layerValue(LayerContribution& contribution, const FbxTime& time) {
-    Components value{};
-    const unsigned int count = std::min(contribution.curveNode->GetChannelsCount(), 4U);
-    for (unsigned int i = 0; i < count; ++i) {
-        FbxAnimCurve* curve = contribution.curveNode->GetCurve(i);
-        value[i] = curve && curve->KeyGetCount() > 0
-                       ? static_cast<double>(curve->Evaluate(time, &contribution.hints[i]))
-                       : contribution.curveNode->channelValue(i);
+    Components value = contribution.values;
+    for (std::size_t i = 0; i < value.size(); ++i) {
+        if (FbxAnimCurve* curve = contribution.curves[i])
+            value[i] = static_cast<double>(curve->Evaluate(time, &contribution.hints[i]));
     }
     return value;
 }
@@ -142,7 +152,7 @@ AnimatedProperty bindAnimation(const FbxProperty& property, FbxAnimStack* stack)
         const auto node = std::find_if(curveNodes.begin(), curveNodes.end(),
                                        [&](auto* each) { return each->IsConnectedDstObject(layer); });
         if (node != curveNodes.end())
-            animation.contributions.push_back({layer, *node, layer == layers.front()});
+            animation.contributions.push_back(contributionOf(*layer, **node, layer == layers.front()));
     }
     return animation;
 }

@@ -11,7 +11,7 @@
 #include <fbxsdk/FbxProperty.h>
 
 FBXSDK_NAMESPACE_BEGIN
-class FbxAnimCurveNode;
+class FbxAnimCurve;
 class FbxAnimLayer;
 class FbxAnimStack;
 namespace detail {
@@ -24,9 +24,10 @@ enum class LayerRule { sum, rotation, scaling };
 /// One layer that has a say for a property.
 struct LayerContribution {
     FbxAnimLayer* layer = nullptr;
-    const FbxAnimCurveNode* curveNode = nullptr;
     bool base = false;                        ///< the stack's first layer: it replaces the static value
-    std::array<int, 4> hints{-1, -1, -1, -1}; ///< search hints of the component curves
+    std::array<FbxAnimCurve*, 4> curves{};    ///< of the components; null where there is none with keys
+    std::array<int, 4> hints{-1, -1, -1, -1}; ///< search hints of the curves
+    Components values{};                      ///< of components without a curve
 };
 
 /// A property with the layers that animate it, lowest first. Valid until the scene changes.

@@ -5,12 +5,15 @@
 #include "container/MappedFile.h"
 
 #include <cerrno>
+#include <functional>
 #include <system_error>
 
 #include <fcntl.h>
 #include <sys/mman.h>
 #include <sys/stat.h>
 #include <unistd.h>
+
+#include "container/PageMemory.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -49,6 +52,17 @@ std::shared_ptr<const MappedFile> refuse(const std::string& fileName, int error,
 MappedFile::~MappedFile() {
     // munmap takes memory that was never written to as writable; the interface knows no other.
     ::munmap(const_cast<char*>(mBytes.data()), mBytes.size());
+}
+
+bool MappedFile::contains(std::span<const char> bytes) const {
+    const std::less_equal<const char*> inOrder; // also for pointers that do not belong together
+    return inOrder(mBytes.data(), bytes.data()) && inOrder(bytes.data() + bytes.size(), mBytes.data() + mBytes.size());
+}
+
+void MappedFile::release(std::span<const char> bytes) const {
+    if (contains(bytes)) {
+        releasePages(bytes); // nothing was ever written to them, so nothing is lost with them
+    }
 }
 
 std::shared_ptr<const MappedFile> MappedFile::open(const std::string& fileName, FbxStatus& status) {

@@ -27,6 +27,12 @@ public:
 
     [[nodiscard]] std::span<const char> bytes() const { return mBytes; }
 
+    /// Whether the bytes are some of these.
+    [[nodiscard]] bool contains(std::span<const char> bytes) const;
+    /// These bytes are done with for now: the pages that lie wholly within them give their memory back, and come again
+    /// from the file for whoever reads them after all. Bytes outside of the file are left alone.
+    void release(std::span<const char> bytes) const;
+
 private:
     explicit MappedFile(std::span<const char> bytes) : mBytes(bytes) {}
 

@@ -53,6 +53,7 @@ std::unique_ptr<RecordTree> readRecords(const std::string& fileName, FbxStatus& 
     std::unique_ptr<RecordTree> tree = readRecords(file->bytes(), fileName, status);
     if (tree) {
         tree->mapping = file;
+        tree->file = file;
     }
     return tree;
 }

@@ -102,6 +102,8 @@ struct Record {
     /// The first value of the child of that name, or a value of type none.
     [[nodiscard]] const Value& childValue(std::string_view childName) const;
 
+    /// The record's array; null when it has none.
+    [[nodiscard]] const StoredArray* array() const;
     /// How many numbers the record carries: the elements of its array, or its numeric scalars.
     [[nodiscard]] std::size_t numberCount() const;
     /// Decodes the first destination.size() numbers straight into the destination, converting where the stored type
@@ -115,6 +117,8 @@ struct Record {
     /// the nearest float.
     [[nodiscard]] bool readFloatBits(std::span<std::uint32_t> destination) const;
 };
+
+class MappedFile;
 
 /// A mapped file and the records cut from it.
 class RecordTree {
@@ -141,7 +145,8 @@ public:
     StoredArray& newArray();
     std::string_view keepText(std::string text);
 
-    std::shared_ptr<const void> mapping; ///< keeps the file's bytes alive
+    std::shared_ptr<const void> mapping;    ///< keeps the bytes alive
+    std::shared_ptr<const MappedFile> file; ///< the mapping, when it is one of a file
 
 private:
     std::pmr::monotonic_buffer_resource mMemory{64 * 1024};

@@ -158,9 +158,11 @@ const Value& Record::childValue(std::string_view childName) const {
     return record != nullptr ? record->value(0) : kNoValue;
 }
 
+const StoredArray* Record::array() const { return findArray(values); }
+
 std::size_t Record::numberCount() const {
-    if (const StoredArray* const array = findArray(values)) {
-        return static_cast<std::size_t>(array->count);
+    if (const StoredArray* const stored = array()) {
+        return static_cast<std::size_t>(stored->count);
     }
     return static_cast<std::size_t>(std::count_if(values.begin(), values.end(), isNumeric));
 }

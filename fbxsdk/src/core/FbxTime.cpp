@@ -92,7 +92,16 @@ FbxLongLong saturated(Wide ticks) {
         std::clamp(ticks, static_cast<Wide>(FBXSDK_TC_MINFINITY), static_cast<Wide>(FBXSDK_TC_INFINITY)));
 }
 
-FbxLongLong rounded(long double ticks) { return saturated(std::round(ticks)); }
+/// To the nearest tick, halves away from zero. Times are set for every sample: the library's rounding takes several
+/// times as long.
+FbxLongLong rounded(long double ticks) {
+    const FbxLongLong whole = saturated(ticks);
+    const long double rest = ticks - static_cast<long double>(whole); // exact, unless the whole is the end of the range
+    if (rest >= 0.5L && whole < FBXSDK_TC_INFINITY) {
+        return whole + 1;
+    }
+    return rest <= -0.5L && whole > FBXSDK_TC_MINFINITY ? whole - 1 : whole;
+}
 
 Wide wide(FbxLongLong ticks) { return ticks; }
 

@@ -51,7 +51,7 @@ void FbxGeometryBase::SetControlPointAt(const FbxVector4& pCtrlPoint, int pIndex
 
 FbxVector4 FbxGeometryBase::GetControlPointAt(int pIndex) const {
     ensureLoaded();
-    return mControlPoints.contains(pIndex) ? mControlPoints[pIndex] : FbxVector4();
+    return mControlPoints.contains(pIndex) ? mControlPoints.value(pIndex) : FbxVector4();
 }
 
 FBXSDK_NAMESPACE_END

@@ -7,6 +7,7 @@
 #include <algorithm>
 #include <vector>
 
+#include "container/MappedFile.h"
 #include "geometry/ItemReading.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -27,16 +28,25 @@ void cutIntoPolygons(PlainArray<int>& corners, PlainArray<int>& starts, int poin
     if (pointCount == 0)
         corners.clear();
     starts.resizeUninitialised(countPolygons(corners));
-    int* start = starts.begin();
+    const int count = corners.count();
+    int* const cornerList = corners.data();
+    int* start = starts.data();
     bool atStart = true;
-    for (int i = 0; i < corners.count(); ++i) {
-        const int stored = corners[i];
+    for (int i = 0; i < count; ++i) {
+        const int stored = cornerList[i];
         const int corner = stored < 0 ? ~stored : stored;
-        corners[i] = corner < pointCount ? corner : 0;
+        cornerList[i] = corner < pointCount ? corner : 0;
         if (atStart)
             *start++ = i;
         atStart = stored < 0;
     }
+}
+
+/// The pages that a list was read from are not needed any more.
+void releaseNumbers(const Document& document, const Record& record) {
+    const StoredArray* const array = record.array();
+    if (array && document.tree->file)
+        document.tree->file->release(array->bytes);
 }
 
 /// Adds offsets, three numbers each, to the points that the indices name; without indices to the first points in order.
@@ -61,11 +71,12 @@ void attachSource(FbxGeometryBase& geometry, const std::shared_ptr<const Documen
     geometry.setSource(std::make_unique<GeometrySource>(GeometrySource{document, object.body}));
 }
 
-void readMesh(FbxMesh& mesh, const Record& body) {
-    if (const Record* vertices = body.child("Vertices"))
-        readItems(*vertices, mesh.points());
-    if (const Record* polygons = body.child("PolygonVertexIndex")) {
+void readMesh(FbxMesh& mesh, const GeometrySource& source) {
+    if (const Record* vertices = source.body->child("Vertices"))
+        fetchItems(*source.document, *vertices, mesh.points());
+    if (const Record* polygons = source.body->child("PolygonVertexIndex")) {
         readItems(*polygons, mesh.polygonVertices());
+        releaseNumbers(*source.document, *polygons);
         cutIntoPolygons(mesh.polygonVertices(), mesh.polygonStarts(), mesh.points().count());
     }
 }

@@ -8,7 +8,12 @@
 #include "geometry/ItemReading.h"
 
 #include <climits>
+#include <type_traits>
 #include <vector>
+
+#include "container/ByteOrder.h"
+#include "container/NumberDecoding.h"
+#include "geometry/StoredBytes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -37,6 +42,26 @@ bool readInPlace(const Record& record, PlainArray<Item>& items) {
     items.resizeUninitialised(count);
     const std::span numbers(reinterpret_cast<double*>(items.data()), static_cast<std::size_t>(count) * kNumbersPerItem);
     return keptIf(record.readNumbers(numbers), items);
+}
+
+/// Smaller arrays are not worth a window to the file.
+constexpr std::size_t kLeastStoredBytes = std::size_t{1} << 14;
+
+/// Whether the packed numbers of an array are items.
+template <class Item>
+bool holdsItems(const StoredArray& array) {
+    using Element = StoredArray::Element;
+    constexpr Element kElement = std::is_same_v<Item, int> ? Element::int32 : Element::float64;
+    return !std::is_same_v<Item, bool> && array.element == kElement && array.stride == 0 &&
+           !needsSwap(array.bigEndian) && array.count * elementSize(kElement) >= kLeastStoredBytes;
+}
+
+/// Null when the array is corrupt.
+std::unique_ptr<StoredBytes> storedBytes(const std::shared_ptr<const MappedFile>& file, const StoredArray& array) {
+    if (!array.compressed)
+        return std::make_unique<MappedBytes>(file, array);
+    auto inflated = std::make_unique<InflatedBytes>(file, array);
+    return inflated->isSound() ? std::move(inflated) : nullptr;
 }
 
 } // namespace
@@ -75,6 +100,29 @@ bool readItems(const Record& record, PlainArray<bool>& items) {
     std::transform(numbers.begin(), numbers.end(), items.begin(), [](int number) { return number != 0; });
     return decoded;
 }
+
+template <class Item>
+bool fetchItems(const Document& document, const Record& record, PlainArray<Item>& items) {
+    const StoredArray* const array = record.array();
+    const std::shared_ptr<const MappedFile>& file = document.tree->file;
+    if (!array || !file || !file->contains(array->bytes) || !holdsItems<Item>(*array))
+        return readItems(record, items);
+    std::unique_ptr<StoredBytes> bytes = storedBytes(file, *array);
+    items.clear();
+    if (!bytes)
+        return false;
+    constexpr std::size_t kNumberBytes = std::is_same_v<Item, int> ? sizeof(std::int32_t) : sizeof(double);
+    const int count = itemCount(record, kStoredBytes<Item> / kNumberBytes);
+    items.keepStored(std::make_unique<StoredItems>(std::move(bytes), count, kStoredBytes<Item>), count);
+    return true;
+}
+
+template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector4>&);
+template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector2>&);
+template bool fetchItems(const Document&, const Record&, PlainArray<FbxColor>&);
+template bool fetchItems(const Document&, const Record&, PlainArray<int>&);
+template bool fetchItems(const Document&, const Record&, PlainArray<double>&);
+template bool fetchItems(const Document&, const Record&, PlainArray<bool>&);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -9,7 +9,7 @@
 #include <fbxsdk/FbxVector2.h>
 #include <fbxsdk/FbxVector4.h>
 
-#include "container/Record.h"
+#include "document/Document.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -26,6 +26,18 @@ bool readItems(const Record& record, PlainArray<FbxColor>& items);
 bool readItems(const Record& record, PlainArray<int>& items);
 bool readItems(const Record& record, PlainArray<double>& items);
 bool readItems(const Record& record, PlainArray<bool>& items);
+
+/// The same for numbers of a document's tree, of which only the values may be asked for. Where a file has them in the
+/// shape of items, compressed or not, they are not kept in memory until somebody asks for more.
+template <class Item>
+bool fetchItems(const Document& document, const Record& record, PlainArray<Item>& items);
+
+extern template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector4>&);
+extern template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector2>&);
+extern template bool fetchItems(const Document&, const Record&, PlainArray<FbxColor>&);
+extern template bool fetchItems(const Document&, const Record&, PlainArray<int>&);
+extern template bool fetchItems(const Document&, const Record&, PlainArray<double>&);
+extern template bool fetchItems(const Document&, const Record&, PlainArray<bool>&);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -70,10 +70,10 @@ void FbxLayerElementTemplate<T>::readPending() const {
     // Pointers are no content of files.
     if constexpr (!std::is_pointer_v<T>) {
         if (source->direct && mDirectArray)
-            detail::readItems(*source->direct, mDirectArray->items());
+            detail::fetchItems(*source->document, *source->direct, mDirectArray->items());
     }
     if (source->index && mIndexArray)
-        detail::readItems(*source->index, mIndexArray->items());
+        detail::fetchItems(*source->document, *source->index, mIndexArray->items());
 }
 
 template class FbxLayerElementTemplate<FbxVector4>;

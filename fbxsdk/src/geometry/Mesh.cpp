@@ -47,7 +47,7 @@ FbxMesh::~FbxMesh() = default;
 FbxNodeAttribute::EType FbxMesh::GetAttributeType() const { return eMesh; }
 
 bool FbxMesh::readSource(const detail::GeometrySource& pSource) {
-    detail::readMesh(*this, *pSource.body);
+    detail::readMesh(*this, pSource);
     detail::readLayers(*this, pSource);
     if (const detail::Record* edges = pSource.body->child("Edges"))
         mEdgeSource.reset(new detail::ElementSource{pSource.document, nullptr, edges});
@@ -107,7 +107,7 @@ bool FbxMesh::GetPolygonVertexNormal(int pPolyIndex, int pVertexIndex, FbxVector
     const int index = valueIndex(*normals, byCorner ? corner : mPolygonVertices[corner]);
     if (index < 0 || index >= direct.GetCount())
         return false;
-    pNormal = direct[index];
+    pNormal = direct.GetAt(index);
     return true;
 }
 

@@ -211,8 +211,11 @@ void store(EvaluationBudget& budget, NodeEvaluation& state, std::int64_t ticks, 
     makeRoom(budget, state);
     if (budget.transforms >= kMaximumCachedTransforms)
         budget.release(state);
-    if (state.times.empty())
+    if (state.times.empty()) {
         budget.holders.push_back(&state);
+        state.times.swap(budget.spareTimes);
+        state.transforms.swap(budget.spareTransforms);
+    }
     const std::size_t place = placeOf(state, ticks);
     state.times.insert(state.times.begin() + static_cast<std::ptrdiff_t>(place), ticks);
     state.transforms.insert(state.transforms.begin() + static_cast<std::ptrdiff_t>(place), transform);
@@ -248,7 +251,8 @@ GlobalTransform globalAt(FbxNode& node, FbxTime time) {
     const std::int64_t ticks = time.Get();
 
     // Up to the nearest ancestor that knows the answer, then down again.
-    std::vector<FbxNode*> path;
+    std::vector<FbxNode*>& path = budget.path;
+    path.clear();
     GlobalTransform transform;
     bool known = false;
     for (FbxNode* each = &node; each && !known; each = each->GetParent()) {
@@ -282,8 +286,12 @@ void EvaluationBudget::release(NodeEvaluation& evaluation) {
         return;
     transforms -= evaluation.times.size();
     std::erase(holders, &evaluation);
-    evaluation.times = {};
-    evaluation.transforms = {};
+    spareTimes = std::move(evaluation.times);
+    spareTransforms = std::move(evaluation.transforms);
+    spareTimes.clear();
+    spareTransforms.clear();
+    evaluation.times.clear();
+    evaluation.transforms.clear();
     evaluation.cursor = 0;
 }
 

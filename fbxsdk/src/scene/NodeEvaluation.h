@@ -50,6 +50,12 @@ struct EvaluationBudget {
     std::size_t transforms = 0;
     std::uint64_t clock = 0;
 
+    // The memory of the node that was released last, for the next one: most have as many transforms.
+    std::vector<std::int64_t> spareTimes;
+    std::vector<GlobalTransform> spareTransforms;
+
+    std::vector<FbxNode*> path; ///< of one evaluation; here to keep its memory
+
     void release(NodeEvaluation& evaluation);
 };
 

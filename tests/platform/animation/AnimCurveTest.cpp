@@ -239,6 +239,22 @@ TEST_F(FbxAnimCurveTest, SpansFromTheFirstKeyToTheLast) {
     EXPECT_EQ(span.GetStop(), FbxTime(30));
 }
 
+TEST_F(FbxAnimCurveTest, EvaluatesAnewAfterEveryChange) {
+    key(0, 0);
+    key(10, 10);
+    for (int i = 0; i < 2; ++i)
+        curve->KeySetInterpolation(i, FbxAnimCurveDef::eInterpolationCubic);
+    const float before = curve->Evaluate(FbxTime(5));
+    EXPECT_EQ(curve->Evaluate(FbxTime(5)), before);
+
+    curve->KeySetValue(1, 30);
+    EXPECT_EQ(curve->Evaluate(FbxTime(5)), 3 * before);
+    curve->KeyMultValue(2);
+    EXPECT_EQ(curve->Evaluate(FbxTime(5)), 6 * before);
+    curve->KeySetInterpolation(0, FbxAnimCurveDef::eInterpolationConstant);
+    EXPECT_EQ(curve->Evaluate(FbxTime(5)), 0);
+}
+
 TEST_F(FbxAnimCurveTest, EvaluatesTheSameWithAnyHint) {
     for (int i = 0; i < 10; ++i)
         key(i * 10, static_cast<float>(i));

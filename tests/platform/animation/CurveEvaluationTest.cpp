@@ -329,15 +329,16 @@ TEST(CurveEvaluation, GivesTheSameInAnyOrderOfSampling) {
     }
     const CurveKeys curve = curveOf(keys, repeat, repeat);
 
-    std::size_t hint = 0;
+    detail::CurveCursor cursor;
     for (int i = -2000; i < 6000; ++i) {
-        ASSERT_EQ(detail::evaluate(curve, ticks(i / 60.0), &hint), at(curve, i / 60.0)) << i;
+        ASSERT_EQ(detail::evaluate(curve, ticks(i / 60.0), &cursor), at(curve, i / 60.0)) << i;
     }
     for (int i = 6000; i > -2000; i -= 7) {
-        ASSERT_EQ(detail::evaluate(curve, ticks(i / 60.0), &hint), at(curve, i / 60.0)) << i;
+        ASSERT_EQ(detail::evaluate(curve, ticks(i / 60.0), &cursor), at(curve, i / 60.0)) << i;
     }
     for (std::size_t wrong : {std::size_t{199}, std::size_t{200}, std::size_t{201}, SIZE_MAX, SIZE_MAX - 1}) {
-        EXPECT_EQ(detail::evaluate(curve, ticks(3.1), &wrong), at(curve, 3.1));
+        cursor.segment = wrong;
+        EXPECT_EQ(detail::evaluate(curve, ticks(3.1), &cursor), at(curve, 3.1));
     }
 }
 
@@ -428,9 +429,10 @@ TEST(CurveEvaluation, SurvivesUnsortedTimes) {
         for (auto& time : curve.times) {
             time = static_cast<std::int64_t>(random());
         }
-        std::size_t hint = random() % 7;
+        detail::CurveCursor cursor;
+        cursor.segment = random() % 7;
         for (int i = 0; i < 50; ++i) {
-            const float value = detail::evaluate(curve, static_cast<std::int64_t>(random()), &hint);
+            const float value = detail::evaluate(curve, static_cast<std::int64_t>(random()), &cursor);
             EXPECT_FALSE(std::isnan(value));
         }
     }

@@ -608,6 +608,27 @@ TEST_F(CacheInvalidationTest, CountsWhatItHoldsAndGivesItBack) {
     EXPECT_EQ(budget.holders.size(), 1U);
 }
 
+TEST_F(CacheInvalidationTest, HandsTheMemoryOfReleasedTransformsToTheNextNode) {
+    detail::EvaluationBudget& budget = manager->data().evaluationBudget;
+    keys(parent->LclTranslation, layer, "X", {{0, 0}, {1, 1}});
+    FbxNode* other = addNode("other");
+    addNode("below", other);
+    keys(other->LclTranslation, layer, "X", {{0, 0}, {1, 1}});
+    for (int i = 0; i < 100; ++i)
+        globalX(parent, seconds(i));
+
+    budget.release(parent->evaluation());
+    EXPECT_EQ(parent->evaluation().times.capacity(), 0U);
+    EXPECT_EQ(parent->evaluation().transforms.capacity(), 0U);
+    EXPECT_GE(budget.spareTransforms.capacity(), 100U);
+    const auto* const memory = budget.spareTransforms.data();
+    for (int i = 0; i < 100; ++i)
+        EXPECT_EQ(globalX(other, seconds(i)), i < 1 ? 0.0 : 1.0) << i;
+
+    EXPECT_EQ(other->evaluation().transforms.data(), memory);
+    EXPECT_EQ(other->evaluation().times.size(), 100U);
+}
+
 TEST_F(NodeEvaluationTest, WalksAChainOfTenThousandWithoutRecursion) {
     FbxAnimLayer* layer = addStack(*scene);
     FbxNode* node = nullptr;

@@ -1,0 +1,41 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The arrays of a mesh as memory, for readers that fill all of them one after the other.
+#pragma once
+
+#include "TnFbxMesh.h"
+
+#include <cstddef>
+#include <vector>
+
+namespace Tarnell::Fbx::detail {
+
+/// Gives a mesh the arrays of TnFbxMesh::allocateGeometryData. The large ones are only reserved at first: each takes
+/// its memory when it is asked for, or else in the end.
+class MeshArrays {
+public:
+    explicit MeshArrays(TnFbxMesh& mesh) : mMesh(mesh) {}
+    MeshArrays(const MeshArrays&) = delete;
+    MeshArrays& operator=(const MeshArrays&) = delete;
+    ~MeshArrays();
+
+    /// To be called first; the mesh is initialised. False when a number is below 1; the mesh is empty then and no array
+    /// may be asked for.
+    bool allocate(int polygons, int controlPoints, int polygonVertices);
+
+    // Each holds as many elements as it has to, defaults at first.
+    int* polygonVertexSizes() { return mMesh.mGeometry.polygonVertexSizes.data(); }
+    int* pointIndices() { return mMesh.mGeometry.pointIndices.data(); }
+    TnFbxMesh::Vector* normals();
+    TnFbxMesh::TextureCoordinate* uvs();
+    TnFbxMesh::Colour* colours();
+
+private:
+    std::size_t polygonVertexCount() const;
+
+    TnFbxMesh& mMesh;
+    bool mAllocated = false;
+};
+
+} // namespace Tarnell::Fbx::detail

@@ -1,0 +1,93 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Pages that are given back: zeros where there is no file behind them, the file's own bytes where there is one.
+#include "container/PageMemory.h"
+
+#include <algorithm>
+#include <new>
+#include <string>
+
+#include <gtest/gtest.h>
+
+#include "container/MappedFile.h"
+#include "support/TemporaryFolder.h"
+
+namespace fbxsdk::detail {
+namespace {
+
+constexpr std::size_t kSize = std::size_t{1} << 20;
+
+std::size_t countOf(std::span<const char> bytes, char value) {
+    return static_cast<std::size_t>(std::count(bytes.begin(), bytes.end(), value));
+}
+
+TEST(PageMemory, HoldsZerosAtFirst) {
+    const PageMemory memory(kSize);
+
+    EXPECT_EQ(memory.bytes().size(), kSize);
+    EXPECT_EQ(countOf(memory.bytes(), '\0'), kSize);
+}
+
+TEST(PageMemory, CanBeOfNoSize) { EXPECT_TRUE(PageMemory(0).bytes().empty()); }
+
+TEST(PageMemory, ThrowsWhenThereIsNotAsMuch) { EXPECT_THROW(PageMemory(SIZE_MAX / 2), std::bad_alloc); }
+
+TEST(PageMemory, LosesTheReleasedPagesAndNothingElse) {
+    const PageMemory memory(kSize);
+    std::fill(memory.bytes().begin(), memory.bytes().end(), 'x');
+    constexpr std::size_t kFrom = 100;
+    constexpr std::size_t kTo = kSize - 100;
+
+    releasePages(memory.bytes().subspan(kFrom, kTo - kFrom));
+
+    EXPECT_EQ(countOf(memory.bytes().first(kFrom), 'x'), kFrom);
+    EXPECT_EQ(countOf(memory.bytes().last(kSize - kTo), 'x'), kSize - kTo);
+    EXPECT_GT(countOf(memory.bytes(), '\0'), kSize / 2);
+}
+
+TEST(PageMemory, KeepsAPageOfWhichOnlyAPartIsReleased) {
+    const PageMemory memory(kSize);
+    std::fill(memory.bytes().begin(), memory.bytes().end(), 'x');
+
+    releasePages(memory.bytes().subspan(1, 1000));
+    releasePages(memory.bytes().first(0));
+
+    EXPECT_EQ(countOf(memory.bytes(), 'x'), kSize);
+}
+
+TEST(MappedFile, ReadsReleasedPagesFromTheFileAgain) {
+    const support::TemporaryFolder folder;
+    std::string content(kSize, '\0');
+    for (std::size_t i = 0; i < kSize; ++i) {
+        content[i] = static_cast<char>(i % 251);
+    }
+    FbxStatus status;
+    const auto file = MappedFile::open(folder.write("file", content), status);
+    ASSERT_TRUE(file);
+
+    file->release(file->bytes());
+    EXPECT_EQ(std::string(file->bytes().begin(), file->bytes().end()), content);
+    file->release(file->bytes().subspan(1000, 500'000));
+    EXPECT_EQ(std::string(file->bytes().begin(), file->bytes().end()), content);
+}
+
+TEST(MappedFile, LeavesMemoryAloneThatIsNotItsOwn) {
+    const support::TemporaryFolder folder;
+    FbxStatus status;
+    const auto file = MappedFile::open(folder.write("file", std::string(kSize, 'f')), status);
+    ASSERT_TRUE(file);
+    const PageMemory other(kSize);
+    std::fill(other.bytes().begin(), other.bytes().end(), 'x');
+
+    EXPECT_FALSE(file->contains(other.bytes()));
+    EXPECT_TRUE(file->contains(file->bytes()));
+    EXPECT_FALSE(file->contains({file->bytes().data(), kSize + 1}));
+    file->release(other.bytes());
+    file->release({});
+
+    EXPECT_EQ(countOf(other.bytes(), 'x'), kSize);
+}
+
+} // namespace
+} // namespace fbxsdk::detail

@@ -1,0 +1,302 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Arrays of which the items stay with their source as long as only values are asked for. The source of these tests
+// spoils what is released, so that nobody reads it unnoticed.
+#include <fbxsdk/FbxPlainArray.h>
+
+#include <algorithm>
+#include <cstring>
+#include <numeric>
+#include <random>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "geometry/StoredBytes.h"
+#include "support/BinaryRecordBuilder.h"
+#include "support/TemporaryFolder.h"
+
+namespace fbxsdk::detail {
+namespace {
+
+using testing::ElementsAre;
+
+struct Calls {
+    std::size_t spoiled = 0; ///< bytes that are not there now
+    int restored = 0;
+    bool gone = false;
+};
+
+class SpoilingBytes final : public StoredBytes {
+public:
+    SpoilingBytes(std::vector<char> bytes, Calls& calls)
+        : mBytes(std::move(bytes)), mOriginal(mBytes), mThere(mBytes.size(), 1), mCalls(calls) {}
+    ~SpoilingBytes() override { mCalls.gone = true; }
+
+    std::span<const char> bytes() const override { return mBytes; }
+    void release(std::span<const char> part) override {
+        const auto first = static_cast<std::size_t>(part.data() - mBytes.data());
+        ASSERT_LE(first + part.size(), mBytes.size());
+        std::fill_n(mBytes.begin() + static_cast<std::ptrdiff_t>(first), part.size(), '\x7F');
+        std::fill_n(mThere.begin() + static_cast<std::ptrdiff_t>(first), part.size(), '\0');
+        mCalls.spoiled = static_cast<std::size_t>(std::count(mThere.begin(), mThere.end(), '\0'));
+    }
+    void restore() override {
+        std::copy(mOriginal.begin(), mOriginal.end(), mBytes.begin());
+        std::fill(mThere.begin(), mThere.end(), '\1');
+        mCalls.spoiled = 0;
+        ++mCalls.restored;
+    }
+
+private:
+    std::vector<char> mBytes, mOriginal, mThere;
+    Calls& mCalls;
+};
+
+template <class Item, class Number>
+void keep(PlainArray<Item>& array, const std::vector<Number>& numbers, Calls& calls) {
+    std::vector<char> bytes(numbers.size() * sizeof(Number));
+    std::memcpy(bytes.data(), numbers.data(), bytes.size());
+    const int count = static_cast<int>(bytes.size() / kStoredBytes<Item>);
+    array.keepStored(std::make_unique<StoredItems>(std::make_unique<SpoilingBytes>(std::move(bytes), calls), count,
+                                                   kStoredBytes<Item>),
+                     count);
+}
+
+std::vector<int> upTo(int count) {
+    std::vector<int> numbers(static_cast<std::size_t>(count));
+    std::iota(numbers.begin(), numbers.end(), 0);
+    return numbers;
+}
+
+constexpr int kMany = 1'000'000;
+constexpr std::size_t kManyBytes = kMany * sizeof(int);
+
+TEST(StoredItems, AreGivenUpBehindAReaderInOrder) {
+    Calls calls;
+    PlainArray<int> array;
+    keep(array, upTo(kMany), calls);
+
+    for (int i = 0; i < kMany / 2; ++i) {
+        ASSERT_EQ(array.value(i), i);
+    }
+    EXPECT_GT(calls.spoiled, kManyBytes / 4);
+    for (int i = kMany / 2; i < kMany; ++i) {
+        ASSERT_EQ(array.value(i), i);
+    }
+
+    EXPECT_GT(calls.spoiled, kManyBytes / 8 * 7);
+    EXPECT_EQ(calls.restored, 0);
+}
+
+TEST(StoredItems, AreGivenUpAlsoWhenTheyAreFew) {
+    for (const int count : {100, 1000, 10000}) {
+        Calls calls;
+        PlainArray<int> array;
+        keep(array, upTo(count), calls);
+
+        for (int i = 0; i < count; ++i) {
+            ASSERT_EQ(array.value(i), i);
+        }
+
+        EXPECT_GT(calls.spoiled, static_cast<std::size_t>(count) * sizeof(int) / 8 * 7) << count;
+    }
+}
+
+TEST(StoredItems, ComeAgainForAReaderWhoStartsOver) {
+    Calls calls;
+    PlainArray<int> array;
+    keep(array, upTo(kMany), calls);
+
+    for (int round = 0; round < 3; ++round) {
+        for (int i = 0; i < kMany; ++i) {
+            ASSERT_EQ(array.value(i), i) << round;
+        }
+    }
+    EXPECT_EQ(calls.restored, 2);
+}
+
+TEST(StoredItems, AreGivenUpBehindAReaderWhoGoesBackALittle) {
+    Calls calls;
+    PlainArray<int> array;
+    keep(array, upTo(kMany), calls);
+
+    for (int i = 0; i + 1000 < kMany; ++i) { // as the corners of a grid do
+        ASSERT_EQ(array.value(i + 1000), i + 1000);
+        ASSERT_EQ(array.value(i), i);
+    }
+
+    EXPECT_GT(calls.spoiled, kManyBytes / 8 * 7);
+    EXPECT_EQ(calls.restored, 0);
+}
+
+TEST(StoredItems, StayForAReaderWithoutOrder) {
+    Calls calls;
+    PlainArray<int> array;
+    keep(array, upTo(kMany), calls);
+    std::mt19937 random(5);
+
+    for (int i = 0; i < 10000; ++i) {
+        const int index = static_cast<int>(random() % kMany);
+        ASSERT_EQ(array.value(index), index);
+    }
+
+    EXPECT_EQ(calls.spoiled, 0U);
+    EXPECT_LE(calls.restored, 1);
+}
+
+TEST(StoredItems, HaveTheirValuesWhateverTheOrder) {
+    std::mt19937 random(7);
+    for (int round = 0; round < 200; ++round) {
+        const int count = 1 + static_cast<int>(random() % 5000);
+        Calls calls;
+        PlainArray<int> array;
+        keep(array, upTo(count), calls);
+        int index = 0;
+        for (int i = 0; i < 3 * count; ++i) {
+            ASSERT_EQ(array.value(index), index) << count;
+            const int kind = static_cast<int>(random() % 100);
+            const int jump = static_cast<int>(random() % static_cast<unsigned>(count));
+            index = kind == 0 ? jump : kind == 1 ? 0 : kind == 2 ? count - 1 : kind < 20 ? index - kind : index + 1;
+            index = std::clamp(index, 0, count - 1);
+        }
+    }
+}
+
+TEST(StoredItems, OfOneOrTwoAreReadAsAnyOthers) {
+    for (const int count : {1, 2, 3}) {
+        Calls calls;
+        PlainArray<int> array;
+        keep(array, upTo(count), calls);
+        for (int round = 0; round < 2; ++round) {
+            for (int i = count - 1; i >= 0; --i) {
+                EXPECT_EQ(array.value(i), i);
+            }
+        }
+    }
+}
+
+TEST(StoredItems, GetTheWThatFilesDoNotHave) {
+    Calls calls;
+    PlainArray<FbxVector4> array;
+    keep(array, std::vector<double>{1, 2, 3, 4, 5, 6}, calls);
+
+    ASSERT_EQ(array.count(), 2);
+    EXPECT_EQ(array.value(1), FbxVector4(4, 5, 6, 1));
+    EXPECT_EQ(array[0], FbxVector4(1, 2, 3, 1));
+    EXPECT_EQ(array[1], FbxVector4(4, 5, 6, 1));
+}
+
+TEST(StoredItems, ComeIntoMemoryForAPointerAndStayAsTheyAreChanged) {
+    Calls calls;
+    PlainArray<int> array;
+    keep(array, upTo(kMany), calls);
+    for (int i = 0; i < kMany; ++i) {
+        ASSERT_EQ(array.value(i), i); // gives up most of them
+    }
+
+    int* const items = array.data();
+    ASSERT_TRUE(std::equal(items, items + kMany, upTo(kMany).begin()));
+    EXPECT_TRUE(calls.gone);
+    items[17] = -1;
+
+    EXPECT_EQ(array.value(17), -1);
+    EXPECT_EQ(array.data(), items);
+}
+
+TEST(StoredItems, CanBeAddedToInsertedAndRemoved) {
+    Calls calls;
+    PlainArray<int> added, inserted, removed, resized, cleared;
+    for (PlainArray<int>* array : {&added, &inserted, &removed, &resized, &cleared}) {
+        keep(*array, upTo(3), calls);
+    }
+
+    added.add(9);
+    inserted.insert(1, 9);
+    removed.remove(1);
+    resized.resize(5, 7);
+    cleared.clear();
+
+    const auto itemsOf = [](const PlainArray<int>& array) { return std::vector<int>(array.begin(), array.end()); };
+    EXPECT_THAT(itemsOf(added), ElementsAre(0, 1, 2, 9));
+    EXPECT_THAT(itemsOf(inserted), ElementsAre(0, 9, 1, 2));
+    EXPECT_THAT(itemsOf(removed), ElementsAre(0, 2));
+    EXPECT_THAT(itemsOf(resized), ElementsAre(0, 1, 2, 7, 7));
+    EXPECT_THAT(itemsOf(cleared), ElementsAre());
+    cleared.add(4);
+    EXPECT_THAT(itemsOf(cleared), ElementsAre(4));
+}
+
+TEST(StoredItems, TakeThePlaceOfWhatWasThere) {
+    Calls first, second;
+    PlainArray<int> array;
+    array.add(8);
+    keep(array, upTo(3), first);
+    keep(array, upTo(2), second);
+
+    EXPECT_TRUE(first.gone);
+    EXPECT_EQ(array.count(), 2);
+    EXPECT_EQ(array.value(1), 1);
+}
+
+class InflatedBytesTest : public testing::Test {
+protected:
+    static constexpr std::size_t kSize = std::size_t{1} << 20;
+
+    InflatedBytesTest() : mContent(kSize, '\0') {
+        for (std::size_t i = 0; i < kSize; ++i) {
+            mContent[i] = static_cast<char>(i % 251);
+        }
+    }
+    InflatedBytes inflated(const std::string& stream) {
+        FbxStatus status;
+        const auto file = MappedFile::open(mFolder.write("file", stream), status);
+        StoredArray array;
+        array.element = StoredArray::Element::int8;
+        array.compressed = true;
+        array.count = kSize;
+        array.bytes = file->bytes();
+        return InflatedBytes(file, array);
+    }
+    static std::string contentOf(const StoredBytes& bytes) { return {bytes.bytes().begin(), bytes.bytes().end()}; }
+
+    support::TemporaryFolder mFolder;
+    std::string mContent;
+};
+
+TEST_F(InflatedBytesTest, AreInflatedAgainWhenTheyWereReleased) {
+    InflatedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
+    EXPECT_TRUE(bytes.isSound());
+    EXPECT_EQ(contentOf(bytes), mContent);
+
+    bytes.release(bytes.bytes());
+    EXPECT_NE(contentOf(bytes), mContent);
+
+    bytes.restore();
+    EXPECT_EQ(contentOf(bytes), mContent);
+}
+
+TEST_F(InflatedBytesTest, StayOnceTheyWereInflatedTwice) {
+    InflatedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
+    bytes.release(bytes.bytes());
+    bytes.restore();
+
+    bytes.release(bytes.bytes());
+
+    EXPECT_EQ(contentOf(bytes), mContent);
+}
+
+TEST_F(InflatedBytesTest, OfACorruptStreamAreZero) {
+    std::string stream = BinaryRecordBuilder::deflated(mContent);
+    stream[stream.size() / 2] = static_cast<char>(stream[stream.size() / 2] ^ 0x55);
+
+    const InflatedBytes bytes = inflated(stream);
+
+    EXPECT_FALSE(bytes.isSound());
+    EXPECT_EQ(contentOf(bytes), std::string(kSize, '\0'));
+}
+
+} // namespace
+} // namespace fbxsdk::detail
