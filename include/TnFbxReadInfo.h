@@ -38,7 +38,9 @@ public:
     bool getGlobalTransform() const; ///< Transforms are read in the world, not relative to their parents. Default true.
 
     bool setTransformPoints(bool transformPoints);
-    bool getTransformPoints() const; ///< Mesh points are multiplied by their node's transform. Default true.
+    /// Mesh points are multiplied by their node's transform. Default true. Points of a skin are in the world without
+    /// it, and would be moved twice: switch it off to get them where the application shows them.
+    bool getTransformPoints() const;
 
     bool setUseSampleFPS(bool useSampleFPS);
     bool getUseSampleFPS() const; ///< Sampled at `getSampleFPS` instead of the scene's own rate. Default false.

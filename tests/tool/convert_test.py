@@ -12,6 +12,7 @@ import unittest
 from support import ROOT, SHOT, dump, named, run
 
 MOVING = os.path.join(ROOT, "tests", "data", "tool", "moving_triangle.fbx")
+SKINNED = os.path.join(ROOT, "tests", "data", "blender", "skin_7400_binary.fbx")
 YEARS = {"2010": 6100, "2011": 7100, "2012": 7200, "2013": 7300, "2014": 7400, "2016": 7500}
 
 
@@ -158,6 +159,34 @@ class Convert(unittest.TestCase):
             self.assertEqual(stream.read(12), b"POINTCACHE2\0")
             _, points, start, rate, samples_ = struct.unpack("<iiffi", stream.read(20))
         self.assertEqual((points, start, samples_), (3, 1003, 4))
+
+    def test_a_skinned_mesh_stands_where_its_bones_take_it(self):
+        """A strip that stands on two bones, of which the upper one bends by 90 degrees over four frames."""
+        warned = self.convert("--frames", "1001:1005", "--cache", "max", source=SKINNED).stderr
+        self.assertNotIn("moving meshes", warned)
+        for frame in (1001, 1003, 1005):
+            points = dump("--kind", "meshes", "--frame", str(frame), self.out)["meshes"][0]["controlPoints"]
+            angle = math.radians(22.5 * (frame - 1001))
+            for i, height in enumerate((0, 100, 200, 300, 400)):
+                bent = max(height - 200, 0)
+                expected = [0, min(height, 200) + bent * math.cos(angle), bent * math.sin(angle)]
+                for seen, wanted in zip(points[6 * i:6 * i + 3], expected):
+                    self.assertAlmostEqual(seen, wanted, places=3)
+
+    def test_a_deformation_that_is_not_written_is_said(self):
+        self.assertIn("moving meshes: 1", self.convert(source=SKINNED).stderr)
+
+    def test_a_mesh_keeps_the_geometric_transform_of_its_node(self):
+        with open(MOVING, encoding="utf-8") as stream:
+            text = stream.read()
+        turned = os.path.join(self.folder.name, "turned.fbx")
+        anchor = '"Mesh" {\n\t\tVersion: 232\n'
+        self.assertEqual(text.count(anchor), 1)
+        offset = 'Properties70:  {\n\tP: "GeometricTranslation", "Vector3D", "Vector", "",0,0,7\n}\n'
+        with open(turned, "w", encoding="utf-8") as stream:
+            stream.write(text.replace(anchor, anchor + offset))
+        self.convert("--frames", "1003:1003", "--cache", "none", source=turned)
+        self.assertEqual(self.points(self.out)[0][2], [4, 0, 7, 5, 0, 7, 4, 1, 7])
 
     def test_without_caches_points_stand_as_at_the_first_frame(self):
         self.convert("--frames", "1003:1006", "--cache", "none", source=MOVING)

@@ -203,25 +203,36 @@ private:
 
     /// A camera that follows a target keeps the rotation that the library computes from it.
     void placeCameras() {
-        std::multimap<std::string, FbxNode*> nodes;
-        collectCameraNodes(*mSdk.getScene()->GetRootNode(), nodes);
-        for (TnFbxCamera* camera : mCameras.chosen) {
-            const auto found = nodes.find(camera->getName());
-            if (found == nodes.end())
-                continue;
-            if (!found->second->GetTarget())
-                placeCamera(*camera, *found->second, mTime);
-            nodes.erase(found);
+        for (const auto& [camera, node] :
+             nodesOf(mCameras, [](FbxNode& node) { return node.GetCamera() != nullptr; })) {
+            if (!node->GetTarget())
+                placeCamera(*camera, *node, mTime);
         }
     }
 
-    /// In the order in which the library reads them.
-    static void collectCameraNodes(FbxNode& parent, std::multimap<std::string, FbxNode*>& nodes) {
+    /// The objects with the nodes that they were read from. Of several that have one name, the library reads the first
+    /// in the tree first.
+    template <class Object>
+    std::vector<std::pair<Object*, FbxNode*>> nodesOf(const Objects<Object>& objects, bool (*isOfKind)(FbxNode&)) {
+        std::multimap<std::string, FbxNode*> named;
+        collectNodes(*mSdk.getScene()->GetRootNode(), isOfKind, named);
+        std::vector<std::pair<Object*, FbxNode*>> found;
+        for (Object* object : objects.chosen) {
+            const auto [node, end] = named.equal_range(object->getName());
+            if (node == end)
+                continue;
+            found.emplace_back(object, node->second);
+            named.erase(node);
+        }
+        return found;
+    }
+
+    static void collectNodes(FbxNode& parent, bool (*isOfKind)(FbxNode&), std::multimap<std::string, FbxNode*>& named) {
         for (int i = 0; i < parent.GetChildCount(); ++i) {
             FbxNode& child = *parent.GetChild(i);
-            if (child.GetCamera())
-                nodes.emplace(child.GetName(), &child);
-            collectCameraNodes(child, nodes);
+            if (isOfKind(child))
+                named.emplace(child.GetName(), &child);
+            collectNodes(child, isOfKind, named);
         }
     }
 
@@ -243,52 +254,28 @@ private:
 
     /// Meshes at the first frame, with a set of points for each further one.
     bool readMeshes() {
-        mInfo.setUseSampleFPS(mOptions.fps.has_value());
-        mInfo.setSampleFPS(mTime.getFrameRate());
+        mInfo.setTransformPoints(false);
         if (!collect(mMeshes, &FbxSdk::getNumberOfMeshes, 4, &FbxSdk::getMeshes))
             return false;
+        mInfo.setTransformPoints(true);
+        const auto nodes = nodesOf(mMeshes, [](FbxNode& node) { return node.GetMesh() != nullptr; });
+        mSdk.openClosePointCacheData(mSdk.getScene(), /*open=*/true);
+        const MeshPlacement placement(mSdk, mOptions.local);
+        for (const auto& [mesh, node] : nodes)
+            placement.place(*mesh, *node, timeAt(mTime, firstFrame()));
         for (long long frame = firstFrame() + 1LL; frame <= lastFrame(); ++frame) {
             mProgress.say("reading meshes, frame " + std::to_string(frame) + " of " + std::to_string(lastFrame()));
-            mInfo.setFrame(static_cast<float>(frame));
-            if (!addPoints())
-                return false;
+            for (const auto& [mesh, node] : nodes)
+                placement.addPoints(*mesh, *node, timeAt(mTime, frame));
         }
-        mInfo.setFrame(static_cast<float>(firstFrame()));
-        mInfo.setUseSampleFPS(false);
-        if (!cachesPoints())
-            loseMotion();
-        return true;
-    }
-
-    bool addPoints() {
-        std::unique_ptr<TnFbxMesh[]> meshes;
-        int number = 0;
-        if (!readAll(meshes, number, &FbxSdk::getNumberOfMeshes, 4, &FbxSdk::getMeshes))
-            return false;
-        for (int i = 0; i < number && i < static_cast<int>(mMeshes.chosen.size()); ++i) {
-            TnFbxMesh& target = *mMeshes.chosen[static_cast<std::size_t>(i)];
-            const TnFbxMesh& source = meshes[static_cast<std::size_t>(i)];
-            const int points = source.getNumberOfControlPoints();
-            if (points != target.getNumberOfControlPoints()) {
-                mComplaint = target.getName() + " has another number of points at frame " +
-                             std::to_string(static_cast<int>(mInfo.getFrame())) +
-                             ", which no point cache can hold (see --cache none)";
-                return false;
-            }
-            target.addControlPointSet();
-            float x = 0.0F, y = 0.0F, z = 0.0F;
-            for (int k = 0; k < points; ++k) {
-                source.getControlPoint(k, x, y, z);
-                target.addControlPoint(x, y, z);
-            }
+        mSdk.openClosePointCacheData(mSdk.getScene(), /*open=*/false);
+        if (!cachesPoints()) {
+            const auto moving = std::count_if(nodes.begin(), nodes.end(), [this](const auto& pair) {
+                return moves(*pair.first) || mSdk.getDeformation(pair.second->GetMesh());
+            });
+            lose(static_cast<int>(moving), "written as they stand at the first frame (see --frames): moving meshes");
         }
         return true;
-    }
-
-    void loseMotion() {
-        const auto moving = std::count_if(mMeshes.chosen.begin(), mMeshes.chosen.end(),
-                                          [](const TnFbxMesh* mesh) { return moves(*mesh); });
-        lose(static_cast<int>(moving), "written as they stand at the first frame (see --frames): moving meshes");
     }
 
     static bool moves(const TnFbxMesh& mesh) {

@@ -13,6 +13,7 @@
 
 #include <fbxsdk.h>
 
+#include "CacheCheck.h"
 #include "Commands.h"
 
 namespace tool {
@@ -182,16 +183,17 @@ void printStacks(FbxScene& scene, std::ostream& out) {
     }
 }
 
-/// Caches that the file names but that cannot be read: their meshes show undeformed.
-void printMissingCaches(FbxScene& scene, std::ostream& out) {
-    for (int i = 0; i < scene.GetSrcObjectCount<FbxCache>(); ++i) {
-        FbxCache& cache = *scene.GetSrcObject<FbxCache>(i);
-        FbxStatus status;
-        if (cache.OpenFileForRead(&status)) {
-            cache.CloseFile();
-        } else {
-            out << "  Cache         \"" << cache.GetName() << "\" cannot be read: " << status.GetErrorString() << '\n';
-        }
+const char* nameOf(const FbxMesh& mesh) {
+    return mesh.GetNodeCount() > 0 ? mesh.GetNode(0)->GetName() : mesh.GetName();
+}
+
+/// Meshes that show without their point cache, or with a damaged one, and why.
+void printCacheFaults(FbxScene& scene, std::ostream& out) {
+    for (int i = 0; i < scene.GetSrcObjectCount<FbxMesh>(); ++i) {
+        FbxMesh& mesh = *scene.GetSrcObject<FbxMesh>(i);
+        const std::string fault = cacheFault(mesh);
+        if (!fault.empty())
+            out << "  Cache         \"" << nameOf(mesh) << "\" cannot use its point cache: " << fault << '\n';
     }
 }
 
@@ -213,7 +215,7 @@ void printFile(const std::string& file, FbxImporter& importer, FbxScene& scene, 
     printStacks(scene, out);
     out << "  Nodes         " << countKinds(*scene.GetRootNode()) << '\n';
     printTree(*scene.GetRootNode(), out);
-    printMissingCaches(scene, out);
+    printCacheFaults(scene, out);
     if (!header)
         return;
     for (const FbxString& warning : header->mWarnings)

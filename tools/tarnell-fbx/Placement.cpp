@@ -6,6 +6,7 @@
 
 #include <array>
 #include <cmath>
+#include <memory>
 #include <vector>
 
 namespace tool {
@@ -77,15 +78,64 @@ FbxAMatrix rotationAt(const TnFbxTransform& object, float frame) {
 
 } // namespace
 
+FbxTime timeAt(const TnFbxTime& range, long long frame) {
+    FbxTime time;
+    time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(range.getFrameRate()));
+    return time;
+}
+
+FbxAMatrix MeshPlacement::placeOf(FbxNode& node, FbxTime time) const {
+    return (mLocal ? node.EvaluateLocalTransform(time) : node.EvaluateGlobalTransform(time)) * mSdk.getGeometry(&node);
+}
+
+std::vector<FbxVector4> MeshPlacement::pointsOf(FbxNode& node, FbxTime time) const {
+    FbxMesh& mesh = *node.GetMesh();
+    const FbxVector4* points = mesh.GetControlPoints();
+    std::unique_ptr<FbxVector4[]> deformed;
+    if (mSdk.getDeformation(&mesh)) {
+        FbxAMatrix inWorld = node.EvaluateGlobalTransform(time) * mSdk.getGeometry(&node);
+        FbxVector4* made = nullptr;
+        mSdk.getDeformedControlPoints(&node, &mesh, time, inWorld, &made);
+        deformed.reset(made);
+        points = made ? made : points;
+    }
+    const FbxAMatrix place = placeOf(node, time);
+    std::vector<FbxVector4> placed;
+    placed.reserve(static_cast<std::size_t>(mesh.GetControlPointsCount()));
+    for (int i = 0; i < mesh.GetControlPointsCount(); ++i)
+        placed.push_back(place.MultT(points[i]));
+    return placed;
+}
+
+void MeshPlacement::place(TnFbxMesh& mesh, FbxNode& node, FbxTime time) const {
+    const std::vector<FbxVector4> points = pointsOf(node, time);
+    for (std::size_t i = 0; i < points.size(); ++i)
+        mesh.setControlPoint(static_cast<int>(i), static_cast<float>(points[i][0]), static_cast<float>(points[i][1]),
+                             static_cast<float>(points[i][2]));
+    FbxAMatrix rotation;
+    rotation.SetR(placeOf(node, time).GetR());
+    for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
+        float x = 0.0F, y = 0.0F, z = 0.0F;
+        mesh.getNormal(i, x, y, z);
+        const FbxVector4 normal =
+            rotation.MultT({static_cast<double>(x), static_cast<double>(y), static_cast<double>(z)});
+        mesh.setNormal(i, static_cast<float>(normal[0]), static_cast<float>(normal[1]), static_cast<float>(normal[2]));
+    }
+}
+
+void MeshPlacement::addPoints(TnFbxMesh& mesh, FbxNode& node, FbxTime time) const {
+    mesh.addControlPointSet();
+    for (const FbxVector4& point : pointsOf(node, time))
+        mesh.addControlPoint(static_cast<float>(point[0]), static_cast<float>(point[1]), static_cast<float>(point[2]));
+}
+
 void placeCamera(TnFbxCamera& camera, FbxNode& node, const TnFbxTime& range) {
     // What is written is turned by a further quarter, so that the view axis of hosts becomes that of files.
     const FbxAMatrix quarter = turned({0, -90, 0});
     Curves positions, rotations;
     FbxVector4 angles;
     for (long long frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
-        FbxTime time;
-        time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(range.getFrameRate()));
-        const FbxAMatrix& world = node.EvaluateGlobalTransform(time);
+        const FbxAMatrix& world = node.EvaluateGlobalTransform(timeAt(range, frame));
         append(positions, world.GetT());
         FbxAMatrix rotation;
         rotation.SetQ(world.GetQ());

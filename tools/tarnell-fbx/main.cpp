@@ -4,6 +4,7 @@
 // tarnell-fbx: options and commands.
 #include <algorithm>
 #include <cstdio>
+#include <exception>
 #include <iostream>
 #include <map>
 #include <sstream>
@@ -69,7 +70,7 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
     dump->add_option("--sample-fps", options.sampleFps, "Sample at this many frames per second");
     dump->add_flag_callback(
         "--no-transform-points", [&options] { options.transformPoints = false; },
-        "Leave mesh points in the node's space");
+        "Leave mesh points in the node's space, those of skins in the world");
     dump->add_flag("--compute-camera-rotation", options.computeCameraRotation,
                    "Compute the rotation of cameras without target from their interest");
     dump->add_option("--name", options.name, "Only the object of that name");
@@ -119,9 +120,7 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
     convert->add_flag("--force", options.force, "Overwrite what is there already");
 }
 
-} // namespace
-
-int main(int argc, char** argv) {
+int run(int argc, char** argv) {
     std::ios::sync_with_stdio(false);
     CLI::App app("Looks into FBX files and writes them", "tarnell-fbx");
     app.require_subcommand(1);
@@ -143,4 +142,15 @@ int main(int argc, char** argv) {
     if (*info)
         return tool::info(infoFiles);
     return app.got_subcommand("convert") ? tool::convert(convertOptions) : tool::dump(dumpOptions);
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    try {
+        return run(argc, argv);
+    } catch (const std::exception& error) { // mostly that there is no memory left
+        std::fprintf(stderr, "tarnell-fbx: %s\n", error.what());
+        return tool::kUnreadable;
+    }
 }
