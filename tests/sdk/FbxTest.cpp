@@ -14,7 +14,6 @@
 
 #include <memory>
 #include <string>
-#include <thread>
 
 namespace Tarnell::Fbx {
 namespace {
@@ -326,29 +325,6 @@ TEST(FbxReading, MakesMeshesOfNurbs) {
 
     ASSERT_EQ(read.names(), Names({"sheet"}));
     EXPECT_GT(read.objects[0].getNumberOfPolygons(), 0);
-}
-
-TEST(FbxReading, RunsOnSeveralThreadsAtOnce) {
-    const auto readAll = [](int& sum) {
-        for (int i = 0; i < 4; ++i) {
-            const Read cameras(&Fbx::getCameras, optionsFor("camera_7400_ascii.fbx"));
-            const Read lights(&Fbx::getLights, optionsFor("lights_7400_ascii.fbx"));
-            const Read meshes(&Fbx::getMeshes, optionsFor("mesh_7400_ascii.fbx"));
-            const Read failed(&Fbx::getNulls, optionsFor("there is no such file.fbx"));
-            sum += cameras.count + lights.count + meshes.count + (lastError().empty() ? 1000 : 0);
-            sum += static_cast<int>(samplesOf(cameras.objects[7], Transform::kFbxTransformPositionX).size());
-        }
-    };
-    int sums[] = {0, 0, 0};
-    std::thread first(readAll, std::ref(sums[0]));
-    std::thread second(readAll, std::ref(sums[1]));
-    readAll(sums[2]);
-    first.join();
-    second.join();
-
-    for (const int sum : sums) {
-        EXPECT_EQ(sum, 4 * (8 + 4 + 1 + 10));
-    }
 }
 
 // ---- Loading and counting for a context of the caller's ----

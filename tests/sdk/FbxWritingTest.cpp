@@ -11,7 +11,6 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <thread>
 
 namespace Tarnell::Fbx {
 namespace {
@@ -188,31 +187,6 @@ TEST(FbxWriting, WritesALightsDirectionSoThatTheWorldGivesItBack) {
     EXPECT_NEAR(read.getTransformValue(TnFbxTransform::kFbxTransformRotationX), 20.0f, 1e-4f);
     EXPECT_NEAR(read.getTransformValue(TnFbxTransform::kFbxTransformRotationY), 30.0f, 1e-4f);
     EXPECT_NEAR(read.getTransformValue(TnFbxTransform::kFbxTransformRotationZ), 0.0f, 1e-4f);
-}
-
-TEST(FbxWriting, RunsOnSeveralThreadsAtOnce) {
-    TemporaryFolder folder;
-    std::vector<std::thread> threads;
-    for (int i = 0; i < 4; ++i) {
-        threads.emplace_back([&folder, i] {
-            const std::string name = "null" + std::to_string(i);
-            TnFbxNull null = keyedNull(name.c_str());
-            WrittenObjects objects;
-            objects.nulls = {&null};
-            TnFbxWriteInfo info = optionsFor(folder.file(name + ".fbx"));
-            info.setFPS(i % 2 == 0 ? 24.0f : 60.0f);
-            for (int repeat = 0; repeat < 10; ++repeat) {
-                EXPECT_TRUE(write(info, objects)) << lastError();
-            }
-        });
-    }
-    for (std::thread& thread : threads) {
-        thread.join();
-    }
-    for (int i = 0; i < 4; ++i) {
-        const std::string name = "null" + std::to_string(i);
-        EXPECT_THAT(FacadeRead<TnFbxNull>(folder.file(name + ".fbx")).names(), ElementsAre(name));
-    }
 }
 
 } // namespace

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The reason of the last failure: set, cleared and kept per thread.
+// The reason of the last failure: set and cleared.
 #include "TnFbxError.h"
 
 #include "FbxSdk.h"
@@ -9,7 +9,6 @@
 #include <gtest/gtest.h>
 
 #include <string>
-#include <thread>
 
 namespace Tarnell::Fbx {
 namespace {
@@ -31,17 +30,6 @@ TEST(LastError, SurvivesTheEndOfTheContext) {
         EXPECT_TRUE(sdk.destroyFbxSdkManager());
     }
     EXPECT_NE(lastError().find("no such file"), std::string::npos);
-}
-
-TEST(LastError, BelongsToItsThread) {
-    FbxSdk sdk;
-    EXPECT_FALSE(sdk.destroyFbxSdkManager());
-    std::string seen = "nothing yet";
-
-    std::thread([&seen] { seen = lastError(); }).join();
-
-    EXPECT_EQ(seen, "");
-    EXPECT_FALSE(lastError().empty());
 }
 
 } // namespace

@@ -148,7 +148,12 @@ struct Layout {
 
 class WriteFault : public testing::TestWithParam<Layout> {
 protected:
-    WriteFault() { setFileName(file); }
+    // The time stands in files, in ASCII with as many digits as it has: without it all files are of one size.
+    WriteFault() {
+        ::setenv("SOURCE_DATE_EPOCH", "1585690463", 1);
+        setFileName(file);
+    }
+    ~WriteFault() override { ::unsetenv("SOURCE_DATE_EPOCH"); }
 
     void setFileName(const std::string& name) {
         file = name;

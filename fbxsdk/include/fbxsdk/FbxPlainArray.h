@@ -119,11 +119,11 @@ public:
     }
     void reserve(int pCapacity) {
         ensureInMemory();
-        reserveItems(pCapacity, sizeof(T));
+        reserveItems(pCapacity, kItemBytes);
     }
     void resizeUninitialised(int pCount) {
         ensureInMemory();
-        resizeItems(pCount, sizeof(T));
+        resizeItems(pCount, kItemBytes);
     }
     void resize(int pCount, const T& pNewItem) {
         const T item = pNewItem; // it may be one of ours
@@ -135,16 +135,16 @@ public:
     void add(const T& pItem) {
         const T item = pItem;
         ensureInMemory();
-        *static_cast<T*>(openSlot(count(), sizeof(T))) = item;
+        *static_cast<T*>(openSlot(count(), kItemBytes)) = item;
     }
     void insert(int pIndex, const T& pItem) {
         const T item = pItem;
         ensureInMemory();
-        *static_cast<T*>(openSlot(pIndex, sizeof(T))) = item;
+        *static_cast<T*>(openSlot(pIndex, kItemBytes)) = item;
     }
     void remove(int pIndex, int pCount = 1) {
         ensureInMemory();
-        closeSlots(pIndex, pCount, sizeof(T));
+        closeSlots(pIndex, pCount, kItemBytes);
     }
     void clear() {
         forgetStored();
@@ -152,6 +152,8 @@ public:
     }
 
 private:
+    static constexpr std::size_t kItemBytes = sizeof(T); // NOLINT(bugprone-sizeof-expression): items can be pointers
+
     static T storedItem(StoredItems& pItems, int pIndex) {
         T item{};
         std::memcpy(static_cast<void*>(&item), pItems.at(pIndex, kStoredBytes<T>), kStoredBytes<T>);
@@ -162,7 +164,7 @@ private:
             readStored();
     }
     void readStored() const {
-        const std::unique_ptr<StoredItems> stored = takeStored(sizeof(T));
+        const std::unique_ptr<StoredItems> stored = takeStored(kItemBytes);
         T* const to = static_cast<T*>(items());
         for (int i = 0; i < count(); ++i)
             to[i] = storedItem(*stored, i);

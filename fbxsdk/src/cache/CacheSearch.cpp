@@ -24,6 +24,11 @@ std::string lastFolderOf(const std::string& path) {
     return fileNameOf(FbxPathUtils::GetFolderName(path.c_str()).Buffer());
 }
 
+std::string in(const std::string& folder, const std::string& name) { return folder + "/" + name; }
+std::string in(const std::string& folder, const std::string& subfolder, const std::string& name) {
+    return in(in(folder, subfolder), name);
+}
+
 } // namespace
 
 std::vector<std::string> cacheFileCandidates(const std::string& fbxFile, const std::string& relativeName,
@@ -40,16 +45,18 @@ std::vector<std::string> cacheFileCandidates(const std::string& fbxFile, const s
         const std::string folder = FbxPathUtils::GetFolderName(FbxPathUtils::Resolve(fbxFile.c_str())).Buffer();
         const std::string stem = FbxPathUtils::GetFileName(fbxFile.c_str(), false).Buffer();
         if (isRelative && !climbsOut(relative))
-            add(folder + "/" + relative);
+            add(in(folder, relative));
         add(absolute);
         for (const std::string& name : {relative, absolute}) {
             if (name.empty())
                 continue;
-            add(folder + "/" + stem + "_fpc/" + fileNameOf(name));
-            if (!lastFolderOf(name).empty() && lastFolderOf(name) != "..") {
-                add(folder + "/" + lastFolderOf(name) + "/" + fileNameOf(name));
+            const std::string file = fileNameOf(name);
+            const std::string lastFolder = lastFolderOf(name);
+            add(in(folder, stem + "_fpc", file));
+            if (!lastFolder.empty() && lastFolder != "..") {
+                add(in(folder, lastFolder, file));
             }
-            add(folder + "/" + fileNameOf(name));
+            add(in(folder, file));
         }
     } else {
         add(absolute);

@@ -52,6 +52,7 @@ FbxMesh* cutIntoTriangles(FbxMesh& polygons) {
 
 std::vector<FbxNode*> nodesOf(const FbxNodeAttribute& attribute) {
     std::vector<FbxNode*> nodes;
+    nodes.reserve(static_cast<std::size_t>(attribute.GetNodeCount()));
     for (int i = 0; i < attribute.GetNodeCount(); ++i)
         nodes.push_back(attribute.GetNode(i));
     return nodes;
@@ -60,6 +61,7 @@ std::vector<FbxNode*> nodesOf(const FbxNodeAttribute& attribute) {
 /// In the former one's place, so that the node's choice among its attributes still stands.
 void replaceOn(FbxNode& node, FbxNodeAttribute& former, FbxNodeAttribute& mesh) {
     std::vector<FbxNodeAttribute*> attributes;
+    attributes.reserve(static_cast<std::size_t>(node.GetNodeAttributeCount()));
     for (int i = 0; i < node.GetNodeAttributeCount(); ++i)
         attributes.push_back(node.GetNodeAttributeByIndex(i));
     auto place = std::find(attributes.begin(), attributes.end(), &former);

@@ -37,7 +37,7 @@ bool keptIf(bool decoded, PlainArray<Item>& items) {
 /// Item consists of doubles and nothing else.
 template <class Item>
 bool readInPlace(const Record& record, PlainArray<Item>& items) {
-    constexpr std::size_t kNumbersPerItem = sizeof(Item) / sizeof(double);
+    constexpr std::size_t kNumbersPerItem = sizeof(Item) / sizeof(double); // NOLINT(bugprone-sizeof-expression)
     const int count = itemCount(record, kNumbersPerItem);
     items.resizeUninitialised(count);
     const std::span numbers(reinterpret_cast<double*>(items.data()), static_cast<std::size_t>(count) * kNumbersPerItem);

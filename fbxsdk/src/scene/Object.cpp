@@ -64,7 +64,7 @@ void FbxObject::Destroy(bool pRecursive) {
             doomed.push_back(&object);
     };
     doom(*this);
-    for (std::size_t i = 0; i < doomed.size(); ++i) {
+    for (std::size_t i = 0; i < doomed.size(); ++i) { // NOLINT(modernize-loop-convert): the list grows
         // A scene takes its members along, and its members are its sources.
         const auto* scene = FbxCast<FbxScene>(doomed[i]);
         for (const detail::ConnectionPoint* source : doomed[i]->mData->plug.sources) {

@@ -78,6 +78,7 @@ void scaleIndependent(FbxNode& node, double k) {
 /// Where a converted parent has children that leave its scaling out, they are converted, and theirs likewise.
 std::vector<FbxNode*> independentBelow(FbxNode& root) {
     std::vector<FbxNode*> converted;
+    converted.reserve(static_cast<std::size_t>(root.GetChildCount()));
     for (int i = 0; i < root.GetChildCount(); ++i)
         converted.push_back(root.GetChild(i));
     const std::size_t firstLevel = converted.size();

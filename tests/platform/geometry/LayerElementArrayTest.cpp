@@ -116,11 +116,13 @@ TEST(FbxLayerElementArray, AddsSeveralZerosAtOnce) {
 
 TEST(FbxLayerElementArray, LendsItsItemsAsOneRun) {
     FbxLayerElementArrayTemplate<int> array;
-    int* none = array.GetLocked(none);
+    int* none = nullptr;
+    none = array.GetLocked(none);
     EXPECT_EQ(none, nullptr);
     fill(array, {4, 5});
 
-    int* items = array.GetLocked(items, FbxLayerElementArray::eReadLock);
+    int* items = nullptr;
+    items = array.GetLocked(items, FbxLayerElementArray::eReadLock);
     ASSERT_NE(items, nullptr);
     EXPECT_EQ(items[1], 5);
     items[0] = 3;

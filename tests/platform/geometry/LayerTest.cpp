@@ -123,9 +123,9 @@ TEST_F(FbxLayerTest, HasNoTextureCoordinatesForTypesThatAreNoChannel) {
     FbxLayer* layer = mesh->GetLayer(0);
     auto* uvs = FbxLayerElementUV::Create(mesh, "");
 
-    for (const int type : {-1, int{FbxLayerElement::eNormal}, int{FbxLayerElement::eTypeCount}, 1000}) {
-        layer->SetUVs(uvs, static_cast<FbxLayerElement::EType>(type));
-        EXPECT_EQ(layer->GetUVs(static_cast<FbxLayerElement::EType>(type)), nullptr);
+    for (const auto type : {FbxLayerElement::eUnknown, FbxLayerElement::eNormal, FbxLayerElement::eTypeCount}) {
+        layer->SetUVs(uvs, type);
+        EXPECT_EQ(layer->GetUVs(type), nullptr);
     }
     EXPECT_EQ(layer->GetNormals(), nullptr);
 }

@@ -1,0 +1,95 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Reads and writes of hosts that do several at once, each with objects of its own.
+#include "support/FacadeReads.h"
+#include "support/SceneBuilders.h"
+#include "support/TemporaryFolder.h"
+#include "support/WritingBuilders.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <string>
+#include <thread>
+
+namespace Tarnell::Fbx {
+namespace {
+
+using support::TemporaryFolder;
+using test::FacadeRead;
+using test::samplesOf;
+using test::timeOf;
+using testing::ElementsAre;
+
+constexpr int kThreads = 3;
+constexpr int kRounds = 5;
+
+template <class Work>
+void onAllThreads(const Work& work) {
+    std::vector<std::thread> threads;
+    for (int i = 0; i < kThreads; ++i) {
+        threads.emplace_back([&work, i] { work(i); });
+    }
+    for (std::thread& thread : threads) {
+        thread.join();
+    }
+}
+
+std::string dataFile(const char* name) { return std::string(TARNELL_TEST_DATA "/sdk/") + name; }
+
+TEST(FacadeThreads, ReadTheSameFilesAtTheSameTime) {
+    onAllThreads([](int) {
+        for (int round = 0; round < kRounds; ++round) {
+            FacadeRead<TnFbxCamera> cameras(dataFile("camera_7400_ascii.fbx"));
+            ASSERT_EQ(cameras.count, 8);
+            EXPECT_EQ(samplesOf(cameras.objects[7], TnFbxTransform::kFbxTransformPositionX).size(), 10U);
+            EXPECT_EQ(FacadeRead<TnFbxLight>(dataFile("lights_7400_ascii.fbx")).count, 4);
+            EXPECT_EQ(FacadeRead<TnFbxMesh>(dataFile("mesh_7400_ascii.fbx")).count, 1);
+            EXPECT_EQ(FacadeRead<TnFbxMesh>(dataFile("nurbs_7400_ascii.fbx")).count, 1);
+        }
+    });
+}
+
+TEST(FacadeThreads, WriteFilesOfTheirOwnAtTheSameTime) {
+    const TemporaryFolder folder;
+    onAllThreads([&folder](int thread) {
+        const std::string name = "object" + std::to_string(thread);
+        TnFbxNull null;
+        null.setName(name);
+        null.setTransformValueAt(TnFbxTransform::kFbxTransformPositionX, timeOf(1, 2), {1.0f, 2.0f});
+        const auto mesh = test::movingMesh(name + " waving", 2);
+        TnFbxWriteInfo info;
+        info.setFileName(folder.file(name + ".fbx"));
+        info.setAnimationStackName("walk");
+        info.setFPS(thread == 0 ? 24.0f : 60.0f); // rates are set for a thread
+        info.setStartFrame(1);
+        info.setEndFrame(2);
+        for (int round = 0; round < kRounds; ++round) {
+            EXPECT_TRUE(Fbx().writeFile(info, {}, {}, {}, {&null}, {mesh.get()})) << lastError();
+        }
+    });
+
+    for (int i = 0; i < kThreads; ++i) {
+        const std::string name = "object" + std::to_string(i);
+        EXPECT_THAT(FacadeRead<TnFbxNull>(folder.file(name + ".fbx")).names(), ElementsAre(name));
+        EXPECT_THAT(FacadeRead<TnFbxMesh>(folder.file(name + ".fbx")).names(), ElementsAre(name + " waving"));
+    }
+}
+
+TEST(FacadeThreads, HaveALastErrorEach) {
+    onAllThreads([](int thread) {
+        const std::string missing = "missing" + std::to_string(thread) + ".fbx";
+        for (int round = 0; round < kRounds; ++round) {
+            TnFbxReadInfo info = test::localRead(missing);
+            TnFbxNull* nulls = nullptr;
+            int count = 0;
+            EXPECT_FALSE(Fbx().getNulls(info, &nulls, count));
+            EXPECT_THAT(lastError(), testing::HasSubstr(missing));
+        }
+    });
+    EXPECT_EQ(lastError(), "") << "nothing failed on this thread";
+}
+
+} // namespace
+} // namespace Tarnell::Fbx
