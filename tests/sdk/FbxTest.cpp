@@ -227,8 +227,13 @@ TEST(FbxReading, ReadsTheFirstStackWhateverTheName) {
     test::expectRange(read.objects[0].getTransformTime(Transform::kFbxTransformPositionX), 1001, 1010, 24.0f);
 }
 
-TEST(FbxReading, OfAnAnimatedCamera) {
-    const Read read(&Fbx::getCameras, optionsFor("camera_7400_ascii.fbx", "shot"));
+class FbxReadingOfEachGeneration : public testing::TestWithParam<const char*> {};
+
+INSTANTIATE_TEST_SUITE_P(Files, FbxReadingOfEachGeneration,
+                         testing::Values("camera_5800_ascii.fbx", "camera_6100_ascii.fbx", "camera_7400_ascii.fbx"));
+
+TEST_P(FbxReadingOfEachGeneration, GivesAnAnimatedCamera) {
+    const Read read(&Fbx::getCameras, optionsFor(GetParam(), "shot"));
 
     ASSERT_EQ(read.count, 1) << lastError();
     const TnFbxCamera& camera = read.objects[0];
@@ -243,6 +248,17 @@ TEST(FbxReading, OfAnAnimatedCamera) {
     EXPECT_EQ(camera.getValue(TnFbxCamera::kFbxCameraFarPlane), 5000.0f);
     EXPECT_EQ(camera.getTransformValue(Transform::kFbxTransformRotationY), 20.0f);
     EXPECT_EQ(camera.getApertureMode(), TnFbxCamera::kFbxApertureFocalLength);
+}
+
+TEST(FbxReading, OfMeshesOfOldGenerations) {
+    for (const char* file : {"camera_5800_ascii.fbx", "camera_6100_ascii.fbx"}) {
+        const Read read(&Fbx::getMeshes, optionsFor(file));
+
+        ASSERT_EQ(read.names(), Names({"triangle"})) << file;
+        float x = 0.0f, y = 0.0f, z = 0.0f;
+        EXPECT_TRUE(read.objects[0].getControlPoint(1, x, y, z));
+        EXPECT_EQ(Samples({x, y, z}), Samples({4.0f, 0.0f, 0.0f})) << file;
+    }
 }
 
 TEST(FbxReading, OfACameraAtAnotherRate) {
