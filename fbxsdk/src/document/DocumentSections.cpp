@@ -29,8 +29,8 @@ void writeCameraResolution(const WritableDocument& document, RecordSink& sink) {
     const BlockScope block(sink, "CurrentCameraResolution");
     writeText(sink, "CameraName", camera && !camera->values.empty() ? camera->values[0].toText() : std::string_view());
     writeText(sink, "CameraResolutionMode", "Window Size");
-    writeInteger(sink, "CameraResolutionW", 320);
-    writeInteger(sink, "CameraResolutionH", 200);
+    writeReal(sink, "CameraResolutionW", 320);
+    writeReal(sink, "CameraResolutionH", 200);
 }
 
 void writeMetaData(RecordSink& sink) {
@@ -109,7 +109,7 @@ void writeHeader(const WritableDocument& document, const VersionTraits& traits, 
         const BlockScope block(sink, "FBXHeaderExtension");
         writeInteger(sink, "FBXHeaderVersion", 1003);
         writeInteger(sink, "FBXVersion", static_cast<std::int32_t>(traits.version));
-        if (sink.isBinary() && traits.idsAndTemplates)
+        if (sink.isBinary())
             writeInteger(sink, "EncryptionType", 0);
         if (!traits.idsAndTemplates)
             writeCameraResolution(document, sink);

@@ -18,6 +18,32 @@ namespace {
 /// Settings that this generation does not have.
 constexpr std::string_view kNewerSettings[] = {"TimeMarker", "CurrentTimeMarker"};
 
+/// Properties of objects that this generation does not have, and the value that goes without saying.
+constexpr struct {
+    std::string_view name;
+    double value;
+} kNewerProperties[] = {{"Visibility Inheritance", 1}, {"AreaLightShape", 0}, {"LeftBarnDoor", 20},
+                        {"RightBarnDoor", 20},         {"TopBarnDoor", 20},   {"BottomBarnDoor", 20},
+                        {"EnableBarnDoor", 0}};
+
+bool goesWithoutSaying(const DocumentProperty& property) {
+    return property.values.size() == 1 &&
+           std::any_of(std::begin(kNewerProperties), std::end(kNewerProperties), [&](const auto& row) {
+               return row.name == property.name && row.value == property.values.front().toReal();
+           });
+}
+
+/// The order of kinds within Objects, and that of their counts; others follow.
+constexpr std::string_view kObjectOrder[] = {"Model",    "NodeAttribute", "Geometry", "SceneInfo", "Material",
+                                             "Deformer", "Video",         "Texture",  "Cache"};
+constexpr std::string_view kCountOrder[] = {"Model",          "Material",      "Texture",  "Video", "SceneInfo",
+                                            "GlobalSettings", "NodeAttribute", "Geometry", "Cache", "Deformer"};
+
+template <std::size_t size>
+std::size_t rankIn(const std::string_view (&order)[size], std::string_view record) {
+    return static_cast<std::size_t>(std::find(std::begin(order), std::end(order), record) - std::begin(order));
+}
+
 struct Rate {
     std::int64_t timeMode;
     std::string_view framesPerSecond;
@@ -61,6 +87,9 @@ private:
         }
         count(kinds, "SceneInfo");
         count(kinds, "GlobalSettings");
+        std::stable_sort(kinds.begin(), kinds.end(), [](const ObjectCount& a, const ObjectCount& b) {
+            return rankIn(kCountOrder, a.record) < rankIn(kCountOrder, b.record);
+        });
         std::int32_t total = 0;
         for (const ObjectCount& kind : kinds)
             total += kind.count;
@@ -87,17 +116,31 @@ private:
     void writeObjects() {
         mSink.heading("Object properties");
         const BlockScope block(mSink, "Objects");
-        for (const WritableObject& object : mDocument.objects) {
-            if (mSink.failed())
-                return;
-            if (mLayout.standsAlone(object))
-                writeObject(object);
-        }
+        const std::vector<const WritableObject*> objects = objectsInOrder();
+        const auto behindSceneInfo = std::find_if(objects.begin(), objects.end(), [](const WritableObject* object) {
+            return rankIn(kObjectOrder, object->record) > rankIn(kObjectOrder, "SceneInfo");
+        });
+        std::for_each(objects.begin(), behindSceneInfo, [this](const WritableObject* object) { writeObject(*object); });
         writeSceneInfo(mDocument, mTraits, mSink);
+        std::for_each(behindSceneInfo, objects.end(), [this](const WritableObject* object) { writeObject(*object); });
         writeGlobalSettings();
     }
 
+    [[nodiscard]] std::vector<const WritableObject*> objectsInOrder() const {
+        std::vector<const WritableObject*> objects;
+        for (const WritableObject& object : mDocument.objects) {
+            if (mLayout.standsAlone(object))
+                objects.push_back(&object);
+        }
+        std::stable_sort(objects.begin(), objects.end(), [](const WritableObject* a, const WritableObject* b) {
+            return rankIn(kObjectOrder, a->record) < rankIn(kObjectOrder, b->record);
+        });
+        return objects;
+    }
+
     void writeObject(const WritableObject& object) {
+        if (mSink.failed())
+            return;
         const WritableObject* attribute = mLayout.attributeOf(object.id);
         writeFullName(object.record, object.id);
         mSink.text(object.subClass);
@@ -105,10 +148,13 @@ private:
         if (object.before)
             object.before(mSink, mTraits);
         writeProperties(object, attribute);
-        if (object.after)
+        // An attribute by itself says what it is by its subclass, and has no further records.
+        if (object.after && object.record != "NodeAttribute")
             object.after(mSink, mTraits);
         if (attribute)
             writeAttribute(*attribute);
+        else if (object.record == "NodeAttribute" || object.record == "Geometry")
+            writeAttributeName(object.id);
         mSink.endRecord();
     }
 
@@ -117,7 +163,11 @@ private:
             attribute.before(mSink, mTraits);
         if (attribute.after)
             attribute.after(mSink, mTraits);
-        writeFullName("NodeAttributeName", attribute.id);
+        writeAttributeName(attribute.id);
+    }
+
+    void writeAttributeName(std::int64_t attribute) {
+        writeFullName("NodeAttributeName", attribute);
         mSink.endRecord();
     }
 
@@ -133,13 +183,26 @@ private:
         const BlockScope block(mSink, "Properties60");
         for (const DocumentProperty& property : object.properties)
             writeProperty(property, object.subClass, property.flags);
-        if (!attribute)
-            return;
-        for (const DocumentProperty& property : attribute->properties)
-            writeProperty(property, attribute->subClass, std::string(property.flags) + 'N');
+        if (attribute)
+            writeAttributeProperties(*attribute);
+    }
+
+    /// Those that have other names here stand last.
+    void writeAttributeProperties(const WritableObject& attribute) {
+        std::vector<const DocumentProperty*> renamed;
+        for (const DocumentProperty& property : attribute.properties) {
+            if (legacyPropertyName(attribute.subClass, property.name) != property.name)
+                renamed.push_back(&property);
+            else
+                writeProperty(property, attribute.subClass, std::string(property.flags) + 'N');
+        }
+        for (const DocumentProperty* property : renamed)
+            writeProperty(*property, attribute.subClass, std::string(property->flags) + 'N');
     }
 
     void writeProperty(DocumentProperty property, std::string_view subClass, std::string_view flags) {
+        if (goesWithoutSaying(property))
+            return;
         property.name = legacyPropertyName(subClass, property.name);
         writeProperty60(mSink, property, flags);
     }

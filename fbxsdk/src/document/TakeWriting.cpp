@@ -132,8 +132,6 @@ private:
                 writeKeys(driven, driven.node->properties.front());
             else
                 writeComponents(driven);
-            if (driven.property == "Visibility")
-                writeInteger(mSink, "LayerType", 1);
         }
     }
 

@@ -81,6 +81,10 @@ namespace {
 
 constinit const PropertyTypeInfo kAnimatableEnumInfo{eFbxEnum, "Enum", "Enum", ""};
 constinit const FbxDataType kAnimatableEnumType{&kAnimatableEnumInfo};
+constinit const PropertyTypeInfo kReachTranslationInfo{eFbxDouble, "IK Reach Translation", "IK Reach Translation", ""};
+constinit const FbxDataType kReachTranslationType{&kReachTranslationInfo};
+constinit const PropertyTypeInfo kReachRotationInfo{eFbxDouble, "IK Reach Rotation", "IK Reach Rotation", ""};
+constinit const FbxDataType kReachRotationType{&kReachRotationInfo};
 
 /// Further first type strings that files have, and the type they mean.
 struct Spelling {
@@ -91,6 +95,8 @@ constexpr Spelling kSpellings[] = {
     {"Bool", &kAnimatableBoolType},
     {"Integer", &kAnimatableIntType},
     {"Enum", &kAnimatableEnumType},
+    {"IK Reach Translation", &kReachTranslationType},
+    {"IK Reach Rotation", &kReachRotationType},
     {"Int", &FbxIntDT},
     {"float", &FbxFloatDT},
     {"Real", &FbxNumberDT},

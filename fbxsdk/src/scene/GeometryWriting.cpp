@@ -101,6 +101,7 @@ void writeGeometryRecords(FbxGeometryBase& geometry, const VersionTraits& traits
     else
         writeNurbsRecords(geometry, sink);
     writeLayers(geometry, hasEdges(geometry), traits, sink);
+    writeRecordsBehindLayers(geometry, sink);
 }
 
 } // namespace detail

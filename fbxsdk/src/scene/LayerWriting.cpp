@@ -72,6 +72,7 @@ void writeVectors(const ElementRecords& records, std::string_view name, std::str
     constexpr int kFirstVersionWithFourth = 102;
     if (records.traits.normalVersion >= kFirstVersionWithFourth) {
         std::vector<double> fourth;
+        fourth.reserve(static_cast<std::size_t>(direct.GetCount()));
         for (int i = 0; i < direct.GetCount(); ++i)
             fourth.push_back(direct.GetAt(i)[3]);
         writeArray<double>(records.sink, fourthName, fourth);
@@ -120,6 +121,7 @@ template <class Class>
 void writeFlags(const ElementRecords& records, std::string_view name) {
     DirectArray<bool> direct = directOf<Class>(records.element);
     std::vector<std::uint8_t> flags;
+    flags.reserve(static_cast<std::size_t>(direct.GetCount()));
     for (int i = 0; i < direct.GetCount(); ++i)
         flags.push_back(direct.GetAt(i) ? 1 : 0);
     writeArray<std::uint8_t>(records.sink, name, flags);
@@ -163,13 +165,15 @@ struct ElementKind {
     void (*write)(const ElementRecords& records);
 };
 
-/// The elements in the order of files.
+/// The elements in the order of files, where texture coordinates stand between the two halves and textures behind both.
 const ElementKind kKinds[] = {
     {"LayerElementNormal", Element::eNormal, 0, 101, Reference::asSet, writeNormals},
     {"LayerElementBinormal", Element::eBiNormal, 0, 101, Reference::asSet, writeBinormals},
     {"LayerElementTangent", Element::eTangent, 0, 101, Reference::asSet, writeTangents},
     {"LayerElementPolygonGroup", Element::ePolygonGroup, 101, 101, Reference::index, writePolygonGroups},
     {"LayerElementColor", Element::eVertexColor, 101, 101, Reference::asSet, writeColors},
+};
+const ElementKind kKindsBehindUVs[] = {
     {"LayerElementSmoothing", Element::eSmoothing, 102, 102, Reference::asSet, writeSmoothing},
     {"LayerElementEdgeCrease", Element::eEdgeCrease, 101, 100, Reference::asSet, writeEdgeCreases},
     {"LayerElementVisibility", Element::eVisibility, 101, 101, Reference::asSet, writeVisibility},
@@ -207,6 +211,7 @@ std::vector<ElementKind> allKinds() {
     std::vector<ElementKind> kinds(std::begin(kKinds), std::end(kKinds));
     for (const ChannelRow& row : kChannels)
         kinds.push_back({row.uvs, Access::uvSlot(row.channel), 101, 101, Reference::asSet, writeUVs});
+    kinds.insert(kinds.end(), std::begin(kKindsBehindUVs), std::end(kKindsBehindUVs));
     for (const ChannelRow& row : kChannels)
         kinds.push_back({row.textures, row.channel, 101, 101, Reference::indexToDirect, writeTextures});
     return kinds;

@@ -14,6 +14,7 @@
 #include <fbxsdk/FbxTrimNurbsSurface.h>
 
 #include "document/RecordWriting.h"
+#include "geometry/NurbsNumbers.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -79,7 +80,6 @@ void writeSurface(const FbxNurbsSurfaceBase& surface, const SurfaceNames& names,
     writeArray(sink, "KnotVectorU", spanOf<double>(surface.GetUKnotVector(), surface.GetUKnotCount()));
     writeArray(sink, "KnotVectorV", spanOf<double>(surface.GetVKnotVector(), surface.GetVKnotCount()));
     writeInteger(sink, "GeometryVersion", kGeometryVersion);
-    writeInteger(sink, "FlipNormals", surface.GetFlipNormals() ? 1 : 0);
 }
 
 void writeCurve(const FbxNurbsCurve& curve, RecordSink& sink) {
@@ -88,7 +88,9 @@ void writeCurve(const FbxNurbsCurve& curve, RecordSink& sink) {
     writeInteger(sink, "NurbsCurveVersion", kVersion);
     writeInteger(sink, "Order", curve.GetOrder());
     writeInteger(sink, "Dimension", curve.GetDimension());
-    writeInteger(sink, "Step", curve.GetStep());
+    // kept: the applications' files have no such record; it is written for those who ask for another step.
+    if (curve.GetStep() != kUsualStep)
+        writeInteger(sink, "Step", curve.GetStep());
     writeText(sink, "Form", formName(curve.GetType()));
     writeInteger(sink, "Rational", curve.IsRational() ? 1 : 0);
     writePoints(sink, curve, 4);
@@ -134,8 +136,8 @@ void writeLine(FbxLine& line, RecordSink& sink) {
 }
 
 void writeTrimNurbsSurface(const FbxTrimNurbsSurface& surface, RecordSink& sink) {
-    writeText(sink, "Type", "TrimNurbsSurface");
     writeInteger(sink, "TrimmedNurbVersion", kVersion);
+    writeText(sink, "Type", "TrimNurbsSurface");
     writeInteger(sink, "FlipNormals", surface.GetFlipNormals() ? 1 : 0);
 }
 
@@ -161,6 +163,11 @@ void writeNurbsRecords(FbxGeometryBase& geometry, RecordSink& sink) {
         writeTrimNurbsSurface(*trimmed, sink);
     else if (geometry.Is<FbxBoundary>())
         writeBoundary(sink);
+}
+
+void writeRecordsBehindLayers(const FbxGeometryBase& geometry, RecordSink& sink) {
+    if (geometry.Is<FbxNurbs>() || geometry.Is<FbxNurbsSurface>())
+        writeInteger(sink, "FlipNormals", static_cast<const FbxNurbsSurfaceBase&>(geometry).GetFlipNormals() ? 1 : 0);
 }
 
 } // namespace detail

@@ -13,6 +13,8 @@ namespace detail {
 
 /// NURBS surfaces and curves, trimmed surfaces, boundaries, patches and lines; nothing for other classes.
 void writeNurbsRecords(FbxGeometryBase& geometry, RecordSink& sink);
+/// What stands behind the layers of a geometry, if its class has any such records.
+void writeRecordsBehindLayers(const FbxGeometryBase& geometry, RecordSink& sink);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

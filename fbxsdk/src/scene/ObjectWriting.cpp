@@ -164,6 +164,14 @@ std::string shadingModelOf(const FbxSurfaceMaterial& material) {
 
 void writeMaterial(const Writing& writing) {
     auto& material = writing.as<FbxSurfaceMaterial>();
+    if (writing.traits.idsAndTemplates) {
+        // What the record says need not be said again. Older files list all properties.
+        const std::string model = shadingModelOf(material);
+        std::erase_if(writing.target.properties, [&](const DocumentProperty& property) {
+            return property.name == "ShadingModel" && property.values.size() == 1 &&
+                   property.values.front().toText() == model;
+        });
+    }
     writing.target.before = [&material](RecordSink& sink, const VersionTraits&) {
         writeInteger(sink, "Version", 102);
         writeText(sink, "ShadingModel", shadingModelOf(material));
@@ -222,6 +230,10 @@ void writeStack(const Writing& writing) {
                                                                {"LocalStop", local.stop},
                                                                {"ReferenceStart", reference.start},
                                                                {"ReferenceStop", reference.stop}};
+    // All four, in this order, also where the stack itself holds only some that differ from the defaults.
+    std::vector<DocumentProperty>& properties = writing.target.properties;
+    for (const auto& [name, time] : times)
+        std::erase_if(properties, [name = name](const DocumentProperty& property) { return property.name == name; });
     for (const auto& [name, time] : times)
         writing.set(name, FbxTimeDT, "", Value::ofInteger(time));
 }

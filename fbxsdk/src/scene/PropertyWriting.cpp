@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The mirror of PropertyReading. A property that has become animated changes the spelling of its type: files call what
-// can be animated "Number" where they call what cannot "double".
+// The mirror of PropertyReading. The flag that a property may be animated changes the spelling of its type: files call
+// what can be animated "Number" where they call what cannot "double".
 #include "scene/PropertyWriting.h"
 
 #include <algorithm>
@@ -16,18 +16,26 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// The spelling of a type that may be animated, by that of the type that may not.
+/// The two type strings of what may not be animated, and the one of what may.
 constexpr struct {
-    std::string_view fixed, animatable;
-} kAnimatableTypes[] = {{"double", "Number"}, {"Vector3D", "Vector"}, {"ColorRGB", "Color"},
-                        {"bool", "Bool"},     {"int", "Integer"},     {"enum", "Enum"}};
+    std::string_view fixed, fixedSubType, animatable;
+} kSpellings[] = {{"double", "Number", "Number"}, {"Vector3D", "Vector", "Vector"}, {"ColorRGB", "Color", "Color"},
+                  {"bool", "", "Bool"},           {"int", "Integer", "Integer"},    {"enum", "", "Enum"}};
 
-std::string_view animatableTypeName(std::string_view typeName) {
-    for (const auto& row : kAnimatableTypes) {
-        if (row.fixed == typeName)
-            return row.animatable;
+/// Spells the type as the flag wants it. Other types have one spelling for both.
+void spellType(DocumentProperty& property, bool animatable) {
+    for (const auto& row : kSpellings) {
+        if (animatable && property.typeName == row.fixed && property.subTypeName == row.fixedSubType) {
+            property.typeName = row.animatable;
+            property.subTypeName = {};
+            return;
+        }
+        if (!animatable && property.typeName == row.animatable && property.subTypeName.empty()) {
+            property.typeName = row.fixed;
+            property.subTypeName = row.fixedSubType;
+            return;
+        }
     }
-    return typeName;
 }
 
 bool isAnimated(const PropertyData& property) {
@@ -105,25 +113,21 @@ std::span<const Value> valuesOf(const FbxDataType& type, const PropertyValue& va
 }
 
 DocumentProperty line(std::string_view name, const FbxDataType& type, const PropertyValue& value, std::string flags,
-                      bool animated, RecordTree& texts) {
-    const std::string_view typeName = type.info()->typeName;
-    DocumentProperty property{name, typeName, type.info()->subTypeName, texts.keepText(std::move(flags)),
-                              valuesOf(type, value, texts)};
-    if (animated && animatableTypeName(typeName) != typeName) {
-        property.typeName = animatableTypeName(typeName);
-        property.subTypeName = {};
-    }
-    return property;
+                      RecordTree& texts) {
+    return {name, type.info()->typeName, type.info()->subTypeName, texts.keepText(std::move(flags)),
+            valuesOf(type, value, texts)};
 }
 
 DocumentProperty defaultLine(const PropertyRow& row, RecordTree& texts) {
-    return line(row.name, *row.type, defaultValue(row), row.flags, /*animated*/ false, texts);
+    return line(row.name, *row.type, defaultValue(row), row.flags, texts);
 }
 
 DocumentProperty writableLine(const PropertyData& data, RecordTree& texts) {
     const bool animated = isAnimated(data);
-    return line(data.row ? std::string_view(data.row->name) : std::string_view(data.name), data.type, data.value,
-                flagText(data.flags, animated), animated, texts);
+    DocumentProperty property = line(data.row ? std::string_view(data.row->name) : std::string_view(data.name),
+                                     data.type, data.value, flagText(data.flags, animated), texts);
+    spellType(property, animated || (data.flags & FbxPropertyFlags::eAnimatable) != 0);
+    return property;
 }
 
 bool sameValue(const PropertyValue& a, const PropertyValue& b, EFbxType type) {
