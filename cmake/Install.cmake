@@ -3,6 +3,12 @@ include(CMakePackageConfigHelpers)
 
 set(package_folder "${CMAKE_INSTALL_LIBDIR}/cmake/TarnellFbx")
 
+# Wherever it is installed, the library finds the platform beside it, and the tool finds both.
+file(RELATIVE_PATH programs_to_libraries "${CMAKE_INSTALL_FULL_BINDIR}" "${CMAKE_INSTALL_FULL_LIBDIR}")
+if(NOT TARNELL_FBXSDK_ROOT)
+  set_target_properties(tarnell-fbx PROPERTIES INSTALL_RPATH "$ORIGIN")
+endif()
+
 install(DIRECTORY include/ DESTINATION "${CMAKE_INSTALL_INCLUDEDIR}/tarnell-fbx" FILES_MATCHING PATTERN "*.h")
 if(NOT TARNELL_FBXSDK_ROOT)
   install(DIRECTORY fbxsdk/include/ DESTINATION "${CMAKE_INSTALL_INCLUDEDIR}/tarnell-fbx/platform"
@@ -15,8 +21,11 @@ if(NOT TARNELL_FBXSDK_ROOT)
   install(FILES "${PROJECT_BINARY_DIR}/TarnellFbxConfig.cmake" "${PROJECT_BINARY_DIR}/TarnellFbxConfigVersion.cmake"
     DESTINATION "${package_folder}")
 endif()
+# Relative, so that it holds for any prefix that is chosen later.
+file(RELATIVE_PATH pkgconfig_to_prefix "${CMAKE_INSTALL_FULL_LIBDIR}/pkgconfig" "${CMAKE_INSTALL_PREFIX}")
 configure_file(cmake/tarnell-fbx.pc.in "${PROJECT_BINARY_DIR}/tarnell-fbx.pc" @ONLY)
 install(FILES "${PROJECT_BINARY_DIR}/tarnell-fbx.pc" DESTINATION "${CMAKE_INSTALL_LIBDIR}/pkgconfig")
 if(TARNELL_FBX_TOOL)
+  set_target_properties(tarnell-fbx-tool PROPERTIES INSTALL_RPATH "$ORIGIN/${programs_to_libraries}")
   install(TARGETS tarnell-fbx-tool)
 endif()
