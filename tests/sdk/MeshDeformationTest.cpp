@@ -650,8 +650,25 @@ TEST_P(VertexCache, IsReadThroughTheListOfMeshes) {
     EXPECT_FALSE(scene.cache->IsOpen());
 }
 
+/// Moves every point by 100 along Y: half of the difference to a target, in percent.
+void addShape(TestScene& scene, fbxsdk::FbxNode& node) {
+    fbxsdk::FbxGeometry& mesh = *node.GetGeometry();
+    auto* deformer = fbxsdk::FbxBlendShape::Create(scene.scene, "shapes");
+    auto* channel = fbxsdk::FbxBlendShapeChannel::Create(scene.scene, "channel");
+    auto* target = fbxsdk::FbxShape::Create(scene.scene, "target");
+    target->InitControlPoints(mesh.GetControlPointsCount());
+    for (int i = 0; i < mesh.GetControlPointsCount(); ++i) {
+        target->SetControlPointAt(mesh.GetControlPointAt(i) + FbxVector4(0.0, 2.0, 0.0), i);
+    }
+    mesh.AddDeformer(deformer);
+    deformer->AddBlendShapeChannel(channel);
+    channel->AddTargetShape(target, 100.0);
+    scene.key(channel->DeformPercent, nullptr, {{0, 50.0f}});
+}
+
 TEST_P(VertexCache, ReplacesShapesAndSkin) {
     CacheScene scene(GetParam());
+    addShape(scene, *scene.node);
     addCluster(scene, addSkin(scene, scene.node), {0.0, 100.0, 0.0})->AddControlPointIndex(0, 1.0);
     scene.sdk.openClosePointCacheData(scene.scene, true);
 
@@ -678,6 +695,19 @@ TEST_P(VertexCache, ThatDoesNotOpenIsSwitchedOff) {
 
     EXPECT_FALSE(scene.deformer->Active.Get());
     expectPoint(deformed(scene, scene.node, 1)[0], 0.0, 100.0, 0.0);
+}
+
+TEST_P(VertexCache, ThatDoesNotOpenLeavesShapesAndSkin) {
+    CacheScene scene(GetParam());
+    scene.cache->SetCacheFileName("", "there is no such file");
+    addShape(scene, *scene.node);
+    addCluster(scene, addSkin(scene, scene.node), {5.0, 0.0, 0.0})->AddControlPointIndex(0, 1.0);
+    scene.sdk.openClosePointCacheData(scene.scene, true);
+
+    const Points points = deformed(scene, scene.node, 1);
+
+    expectPoint(points[0], 5.0, 100.0, 0.0);
+    expectPoint(points[1], 1.0, 100.0, 0.0);
 }
 
 TEST_P(VertexCache, OfAnInstanceStaysOpenForBothNodes) {

@@ -5,6 +5,7 @@
 #include "support/TemporaryFolder.h"
 #include "support/WritingBuilders.h"
 
+#include "Fbx.h"
 #include "TnFbxError.h"
 
 #include <gmock/gmock.h>
@@ -294,6 +295,20 @@ TEST(MaxPointCache, IsWrittenByFrameNumbersFromItsStartFrameOn) {
     EXPECT_THAT(filesIn(scene.folder.file("out/shot_fpc")), ElementsAre("ball.pc2"));
 }
 
+TEST(MayaPointCache, HasOneSampleForEveryFrameOfTheRange) {
+    CacheScene scene;
+    ASSERT_TRUE(scene.map());
+
+    EXPECT_TRUE(scene.animate(framesFrom(10, 12))) << lastError();
+
+    const std::string data = scene.folder.read("out/shot_fpc/ball.mcx");
+    int samples = 0;
+    for (std::size_t at = data.find("MYCH"); at != std::string::npos; at = data.find("MYCH", at + 1)) {
+        ++samples;
+    }
+    EXPECT_EQ(samples, 3);
+}
+
 TEST(MayaPointCache, IsNarrowOrWide) {
     for (const bool wide : {true, false}) {
         CacheScene scene;
@@ -361,6 +376,22 @@ TEST(PointCachesOfAScene, AreOnePerMeshInOneFolder) {
     EXPECT_THAT(filesIn(folder.file("out/shot_fpc")),
                 ElementsAre("first.mcx", "first.xml", "second.mcx", "second.xml"));
     EXPECT_EQ(scene.child()->GetGeometry()->GetDeformerCount(fbxsdk::FbxDeformer::eVertexCache), 1);
+}
+
+TEST(PointCachesOfAScene, AreNamedInTheFileByAPathFromItsFolder) {
+    for (const bool maya : {true, false}) {
+        TemporaryFolder folder;
+        const auto mesh = movingMesh("ball", 3);
+        TnFbxWriteInfo info = animatedInfo(folder, 10.0f, 12.0f);
+        info.setMayaVertexCacheFormat(maya);
+        info.setFileFormat(true);
+
+        EXPECT_TRUE(Fbx().writeFile(info, {}, {}, {}, {}, {mesh.get()})) << lastError();
+
+        const std::string relative = std::string("shot_fpc/ball") + (maya ? ".xml" : ".pc2");
+        EXPECT_THAT(folder.read("out/shot.fbx"),
+                    HasSubstr("P: \"CacheFileName\", \"KString\", \"\", \"\", \"" + relative + "\""));
+    }
 }
 
 TEST(PointCachesOfAScene, TruncateTheRangeTowardZero) {

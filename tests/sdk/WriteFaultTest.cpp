@@ -338,6 +338,26 @@ Report writtenWithin(rlim_t bytes, const Action& action) {
     return {!text.empty() && text[0] == '1', text.empty() ? "" : text.substr(1)};
 }
 
+/// How many allocations something takes.
+template <class Action>
+long allocationsOf(const Action& action) {
+    const long before = gAllocations;
+    action();
+    return gAllocations - before;
+}
+
+TEST_P(WriteFault, OfOptionsThatAreIncompleteComesBeforeAnythingIsMade) {
+    const long ofAManager = allocationsOf([] { fbxsdk::FbxManager::Create()->Destroy(); });
+    ASSERT_GT(ofAManager, 0);
+    const TnFbxWriteInfo complete = info;
+
+    info.setAnimationStackName("");
+    EXPECT_LT(allocationsOf([this] { EXPECT_FALSE(write()); }), ofAManager);
+    info = complete;
+    info.setFileName("");
+    EXPECT_LT(allocationsOf([this] { EXPECT_FALSE(write()); }), ofAManager);
+}
+
 TEST_P(WriteFault, OfAMediumThatIsFullAtAnySizeLeavesTheOldFile) {
     writeReference();
     constexpr std::size_t kSteps = 40;

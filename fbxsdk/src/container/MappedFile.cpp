@@ -82,11 +82,13 @@ std::shared_ptr<const MappedFile> MappedFile::open(const std::string& fileName, 
         return nullptr;
     }
     const auto size = static_cast<std::size_t>(facts.st_size);
+    const std::shared_ptr<MappedFile> mapped(new MappedFile); // first, so that nothing can fail behind the mapping
     void* const memory = ::mmap(nullptr, size, PROT_READ, MAP_PRIVATE, file.number(), 0);
     if (memory == MAP_FAILED) {
         return refuse(fileName, errno, status);
     }
-    return std::shared_ptr<const MappedFile>(new MappedFile({static_cast<const char*>(memory), size}));
+    mapped->mBytes = {static_cast<const char*>(memory), size};
+    return mapped;
 }
 
 } // namespace detail

@@ -34,7 +34,7 @@ public:
     void release(std::span<const char> bytes) const;
 
 private:
-    explicit MappedFile(std::span<const char> bytes) : mBytes(bytes) {}
+    MappedFile() = default;
 
     std::span<const char> mBytes;
 };

@@ -35,7 +35,8 @@ FbxLayerContainer::~FbxLayerContainer() {
 
 int FbxLayerContainer::CreateLayer() {
     detachSource();
-    mLayers.emplace_back(new FbxLayer(*this));
+    std::unique_ptr<FbxLayer, LayerDeleter> layer(new FbxLayer(*this));
+    mLayers.push_back(std::move(layer));
     return static_cast<int>(mLayers.size()) - 1;
 }
 

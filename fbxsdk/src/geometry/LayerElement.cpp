@@ -89,10 +89,11 @@ template class FbxLayerElementTemplate<FbxTexture*>;
     Class::Class() = default;                                                                                          \
     Class::~Class() = default;                                                                                         \
     Class* Class::Create(FbxLayerContainer* pOwner, const char* pName) {                                               \
-        auto* element = new Class;                                                                                     \
+        const auto destroy = [](Class* doomed) { delete doomed; };                                                     \
+        std::unique_ptr<Class, decltype(destroy)> element(new Class, destroy);                                         \
         element->SetName(pName);                                                                                       \
         element->joinOwner(pOwner);                                                                                    \
-        return element;                                                                                                \
+        return element.release();                                                                                      \
     }
 
 FBXSDK_LAYER_ELEMENT_IMPLEMENT(FbxLayerElementNormal)
