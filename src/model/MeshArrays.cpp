@@ -24,9 +24,7 @@ Element* filled(std::vector<Element>& array, std::size_t count, const Element& v
 
 MeshArrays::~MeshArrays() {
     if (mAllocated) {
-        normals();
-        uvs();
-        colours();
+        completeWithDefaults();
     }
 }
 
@@ -55,13 +53,11 @@ bool MeshArrays::allocate(int polygons, int controlPoints, int polygonVertices) 
 
 std::size_t MeshArrays::polygonVertexCount() const { return mMesh.mGeometry.pointIndices.size(); }
 
-TnFbxMesh::Vector* MeshArrays::normals() {
-    return filled(mMesh.mGeometry.normals, polygonVertexCount(),
-                  {TnFbxMesh::kDefaultMeshNX, TnFbxMesh::kDefaultMeshNY, TnFbxMesh::kDefaultMeshNZ});
-}
-
-TnFbxMesh::TextureCoordinate* MeshArrays::uvs() {
-    return filled(mMesh.mGeometry.uvs, polygonVertexCount(), {TnFbxMesh::kDefaultMeshU, TnFbxMesh::kDefaultMeshV});
+void MeshArrays::completeWithDefaults() {
+    filled(mMesh.mGeometry.normals, polygonVertexCount(),
+           {TnFbxMesh::kDefaultMeshNX, TnFbxMesh::kDefaultMeshNY, TnFbxMesh::kDefaultMeshNZ});
+    filled(mMesh.mGeometry.uvs, polygonVertexCount(), {TnFbxMesh::kDefaultMeshU, TnFbxMesh::kDefaultMeshV});
+    colours();
 }
 
 TnFbxMesh::Colour* MeshArrays::colours() {

@@ -27,12 +27,16 @@ public:
     // Each holds as many elements as it has to, defaults at first.
     int* polygonVertexSizes() { return mMesh.mGeometry.polygonVertexSizes.data(); }
     int* pointIndices() { return mMesh.mGeometry.pointIndices.data(); }
-    TnFbxMesh::Vector* normals();
-    TnFbxMesh::TextureCoordinate* uvs();
     TnFbxMesh::Colour* colours();
+
+    // Of the polygon vertices in order, from the first one on, as many as there are at most. Those that are not added
+    // have the defaults in the end.
+    void addNormal(const TnFbxMesh::Vector& normal) { mMesh.mGeometry.normals.push_back(normal); }
+    void addUV(const TnFbxMesh::TextureCoordinate& uv) { mMesh.mGeometry.uvs.push_back(uv); }
 
 private:
     std::size_t polygonVertexCount() const;
+    void completeWithDefaults();
 
     TnFbxMesh& mMesh;
     bool mAllocated = false;

@@ -16,7 +16,7 @@ namespace {
 
 using Camera = fbxsdk::FbxCamera;
 
-void writeFilmSize(const ChannelWriter& writer, TnFbxCamera& source, Camera& camera) {
+void writeFilmSize(ChannelWriter& writer, TnFbxCamera& source, Camera& camera) {
     if (TnFbxChannel* width = source.getCameraChannel(TnFbxCamera::kFbxCameraApertureWidth)) {
         camera.SetApertureWidth(static_cast<double>(width->getValue()));
         writer.key(camera.FilmWidth, nullptr, width);
@@ -28,7 +28,7 @@ void writeFilmSize(const ChannelWriter& writer, TnFbxCamera& source, Camera& cam
 }
 
 /// Only what the aperture mode says that the lens hangs on.
-void writeLens(const ChannelWriter& writer, TnFbxCamera& source, Camera& camera) {
+void writeLens(ChannelWriter& writer, TnFbxCamera& source, Camera& camera) {
     switch (source.getApertureMode()) {
     case TnFbxCamera::kFbxApertureHorizontalAndVertical:
         camera.ApertureMode.Set(Camera::eHorizAndVert);
@@ -66,13 +66,13 @@ void writeProjection(const TnFbxCamera& source, Camera& camera) {
 }
 
 /// Writes the channel and returns its static value; the default without a channel.
-float writeOffset(const ChannelWriter& writer, fbxsdk::FbxPropertyT<fbxsdk::FbxDouble>& property, TnFbxChannel* channel,
+float writeOffset(ChannelWriter& writer, fbxsdk::FbxPropertyT<fbxsdk::FbxDouble>& property, TnFbxChannel* channel,
                   float otherwise) {
     writer.write(property, channel);
     return channel != nullptr ? channel->getValue() : otherwise;
 }
 
-void writeFilmOffset(const ChannelWriter& writer, TnFbxCamera& source, Camera& camera) {
+void writeFilmOffset(ChannelWriter& writer, TnFbxCamera& source, Camera& camera) {
     const float x = writeOffset(writer, camera.FilmOffsetX, source.getCameraChannel(TnFbxCamera::kFbxCameraFilmOffsetX),
                                 TnFbxCamera::kDefaultCameraFilmOffsetX);
     const float y = writeOffset(writer, camera.FilmOffsetY, source.getCameraChannel(TnFbxCamera::kFbxCameraFilmOffsetY),
@@ -95,7 +95,7 @@ bool FbxSdk::setCameraCurveValues(fbxsdk::FbxNode* node, TnFbxCamera* camera) {
     if (!setTransformCurveValues(node, camera)) {
         return false;
     }
-    const ChannelWriter writer(*this, currentLayer());
+    ChannelWriter writer(currentLayer());
     writeFilmSize(writer, *camera, *target);
     writer.write(target->NearPlane, camera->getCameraChannel(TnFbxCamera::kFbxCameraNearPlane));
     writer.write(target->FarPlane, camera->getCameraChannel(TnFbxCamera::kFbxCameraFarPlane));

@@ -17,15 +17,16 @@ using detail::succeed;
 
 namespace {
 
-/// A linear key for every frame of the channel's range.
-void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float scale) {
+/// Beyond, times are worked out one by one: a range may say more frames than there is memory for.
+constexpr std::size_t kMostKeptTimes = std::size_t{1} << 20;
+
+void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float scale, detail::KeyTimes& times) {
     const TnFbxTime range = channel.getTime();
-    const auto rate = static_cast<double>(range.getFrameRate());
+    times.begin(range);
     // wider than a frame, so that the count can pass the last int
     for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
         const float value = channel.getAnimatedValue(static_cast<float>(frame));
-        fbxsdk::FbxTime time;
-        time.SetSecondDouble(static_cast<double>(frame) / rate);
+        const fbxsdk::FbxTime time = times.at(frame);
         curve.KeySet(curve.KeyAdd(time), time, value * scale, fbxsdk::FbxAnimCurveDef::eInterpolationLinear);
     }
 }
@@ -53,17 +54,44 @@ fbxsdk::FbxDouble3 staticValues(const TnFbxTransform& transform, TnFbxTransform:
 
 } // namespace
 
-bool FbxSdk::setCurveValues(fbxsdk::FbxAnimCurve* curve, TnFbxChannel* channel, float scale) const {
+void detail::KeyTimes::begin(const TnFbxTime& range) {
+    const auto rate = static_cast<double>(range.getFrameRate());
+    if (mFirstFrame != range.getStartFrame() || mRate != rate) {
+        mTimes.clear();
+    }
+    mFirstFrame = range.getStartFrame();
+    mRate = rate;
+}
+
+fbxsdk::FbxTime detail::KeyTimes::at(std::int64_t frame) {
+    const auto index = static_cast<std::size_t>(frame - mFirstFrame);
+    if (index < mTimes.size()) {
+        return mTimes[index];
+    }
+    fbxsdk::FbxTime time;
+    time.SetSecondDouble(static_cast<double>(frame) / mRate);
+    if (index < kMostKeptTimes) {
+        mTimes.push_back(time);
+    }
+    return time;
+}
+
+bool detail::writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel, float scale, KeyTimes& times) {
     if (curve == nullptr || channel == nullptr) {
         return fail("no curve or no channel to write");
     }
     curve->SetValue(channel->getValue(), /*pCurveNodeIndex*/ 0); // kept: not scaled, although the keys are
     if (channel->getAnimated()) {
         curve->KeyModifyBegin();
-        addKeys(*curve, *channel, scale);
+        addKeys(*curve, *channel, scale, times);
         curve->KeyModifyEnd();
     }
     return succeed();
+}
+
+bool FbxSdk::setCurveValues(fbxsdk::FbxAnimCurve* curve, TnFbxChannel* channel, float scale) const {
+    detail::KeyTimes times;
+    return detail::writeCurve(curve, channel, scale, times);
 }
 
 /// The layer that is written to; null without a stack or layer.
@@ -79,7 +107,7 @@ bool FbxSdk::setTransformCurveValues(fbxsdk::FbxNode* node, TnFbxTransform* tran
     for (const LocalRow& row : kLocalRows) {
         (node->*row.property).Set(staticValues(*transform, row.firstChannel));
     }
-    const ChannelWriter writer(*this, currentLayer());
+    ChannelWriter writer(currentLayer());
     for (const LocalRow& row : kLocalRows) {
         for (int i = 0; i < 3; ++i) {
             TnFbxChannel* channel = transform->getTransformChannel(channelAfter(row.firstChannel, i));

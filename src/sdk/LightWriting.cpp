@@ -22,7 +22,7 @@ namespace {
 using Light = fbxsdk::FbxLight;
 
 /// kept: the alpha is not written
-bool writeColour(const ChannelWriter& writer, TnFbxLight& source, Light& light) {
+bool writeColour(ChannelWriter& writer, TnFbxLight& source, Light& light) {
     std::array<TnFbxChannel*, 3> channels{};
     fbxsdk::FbxDouble3 colour;
     for (int i = 0; i < 3; ++i) {
@@ -41,7 +41,7 @@ bool writeColour(const ChannelWriter& writer, TnFbxLight& source, Light& light) 
 }
 
 /// From 1 to percent, in single precision.
-bool writeIntensity(const ChannelWriter& writer, TnFbxLight& source, Light& light) {
+bool writeIntensity(ChannelWriter& writer, TnFbxLight& source, Light& light) {
     TnFbxChannel* intensity = source.getLightChannel(TnFbxLight::kFbxLightIntensity);
     if (intensity == nullptr) {
         return false;
@@ -71,7 +71,7 @@ void writeDecay(const TnFbxLight& source, Light& light) {
 }
 
 /// What the types of lights differ in.
-bool writeType(const ChannelWriter& writer, TnFbxLight& source, Light& light) {
+bool writeType(ChannelWriter& writer, TnFbxLight& source, Light& light) {
     const TnFbxLight::EFbxLightType type = source.getLightType();
     if (type == TnFbxLight::kFbxLightSpot) {
         TnFbxChannel* cone = source.getLightChannel(TnFbxLight::kFbxLightConeAngle);
@@ -102,7 +102,7 @@ bool FbxSdk::setLightCurveValues(fbxsdk::FbxNode* node, TnFbxLight* light) {
     if (!setTransformCurveValues(node, light)) {
         return false;
     }
-    const ChannelWriter writer(*this, currentLayer());
+    ChannelWriter writer(currentLayer());
     if (!writeColour(writer, *light, *target) || !writeIntensity(writer, *light, *target) ||
         !writeType(writer, *light, *target)) {
         return fail("the light lacks a channel");

@@ -53,16 +53,23 @@ void setPoints(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
     }
 }
 
+template <class Array, class ValueAt>
+void fillArray(Array& array, int count, ValueAt valueAt) {
+    array.SetCount(count);
+    for (int i = 0; i < count; ++i) {
+        array.SetAt(i, valueAt(i));
+    }
+}
+
 void setNormals(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer& layer) {
     auto* normals = fbxsdk::FbxLayerElementNormal::Create(&target, "");
     normals->SetMappingMode(Element::eByPolygonVertex);
     normals->SetReferenceMode(Element::eDirect);
-    auto& direct = normals->GetDirectArray();
-    for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
+    fillArray(normals->GetDirectArray(), mesh.getNumberOfPolygonVertices(), [&mesh](int i) {
         float x = 0.0f, y = 0.0f, z = 0.0f;
         mesh.getNormal(i, x, y, z);
-        direct.Add(point(x, y, z));
-    }
+        return point(x, y, z);
+    });
     layer.SetNormals(normals);
 }
 
@@ -71,13 +78,8 @@ template <class MappedElement, class ValueAt>
 void fillIndexed(MappedElement& element, int count, ValueAt valueAt) {
     element.SetMappingMode(Element::eByPolygonVertex);
     element.SetReferenceMode(Element::eIndexToDirect);
-    auto& direct = element.GetDirectArray();
-    auto& indices = element.GetIndexArray();
-    indices.SetCount(count);
-    for (int i = 0; i < count; ++i) {
-        direct.Add(valueAt(i));
-        indices.SetAt(i, i);
-    }
+    fillArray(element.GetDirectArray(), count, valueAt);
+    fillArray(element.GetIndexArray(), count, [](int i) { return i; });
 }
 
 void setUVs(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer& layer) {

@@ -1,17 +1,16 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Deformed control points: a vertex cache replaces everything, otherwise blend shapes and then skin clusters. And the
-// opening and closing of a scene's point caches.
+// Deformed control points: a vertex cache replaces everything, otherwise blend shapes and then skin clusters, which
+// have a file of their own. And the opening and closing of a scene's point caches.
 #include "FbxSdk.h"
 
 #include "BlendShapeWeights.h"
 #include "LastError.h"
-#include "NodeGeometry.h"
 #include "PropertySampling.h"
+#include "SkinClusters.h"
 
 #include <algorithm>
-#include <cmath>
 #include <memory>
 #include <vector>
 
@@ -21,15 +20,8 @@ using detail::fail;
 
 namespace {
 
-using Cluster = fbxsdk::FbxCluster;
 using Deformer = fbxsdk::FbxDeformer;
-using Matrix = fbxsdk::FbxAMatrix;
 using Point = fbxsdk::FbxVector4;
-
-constexpr int kMatrixElements = 16;
-
-/// Weights are compared in double precision with a threshold of single precision.
-constexpr double kWeightThreshold = static_cast<double>(1e-5f);
 
 fbxsdk::FbxVertexCacheDeformer* vertexCacheOf(const fbxsdk::FbxGeometry& geometry) {
     return geometry.GetDeformerCount(Deformer::eVertexCache) > 0
@@ -42,127 +34,10 @@ bool hasActiveVertexCache(const fbxsdk::FbxGeometry& geometry) {
     return deformer != nullptr && deformer->Active.Get();
 }
 
-/// Calls `visit(cluster)` for every cluster of every skin.
-template <class Visit>
-void forEachCluster(const fbxsdk::FbxMesh& mesh, Visit&& visit) {
-    const int skinCount = mesh.GetDeformerCount(Deformer::eSkin);
-    for (int i = 0; i < skinCount; ++i) {
-        auto* skin = fbxsdk::FbxCast<fbxsdk::FbxSkin>(mesh.GetDeformer(i, Deformer::eSkin));
-        for (int j = 0; skin != nullptr && j < skin->GetClusterCount(); ++j) {
-            if (Cluster* cluster = skin->GetCluster(j)) {
-                visit(*cluster);
-            }
-        }
-    }
-}
-
 bool hasClusters(const fbxsdk::FbxMesh& mesh) {
     bool found = false;
-    forEachCluster(mesh, [&found](Cluster&) { found = true; });
+    detail::forEachCluster(mesh, [&found](fbxsdk::FbxCluster&) { found = true; });
     return found;
-}
-
-/// The mode of the mesh's first cluster holds for all of them.
-Cluster::ELinkMode linkModeOf(const fbxsdk::FbxMesh& mesh) {
-    auto* skin = fbxsdk::FbxCast<fbxsdk::FbxSkin>(mesh.GetDeformer(0, Deformer::eSkin));
-    const Cluster* first = skin != nullptr && skin->GetClusterCount() > 0 ? skin->GetCluster(0) : nullptr;
-    return first != nullptr ? first->GetLinkMode() : Cluster::eNormalize;
-}
-
-void scaleElements(Matrix& matrix, double factor) {
-    double* elements = matrix;
-    for (int i = 0; i < kMatrixElements; ++i) {
-        elements[i] *= factor;
-    }
-}
-
-void addElements(Matrix& matrix, const Matrix& other) {
-    double* elements = matrix;
-    const double* added = other;
-    for (int i = 0; i < kMatrixElements; ++i) {
-        elements[i] += added[i];
-    }
-}
-
-void addToDiagonal(Matrix& matrix, double value) {
-    for (int i = 0; i < 4; ++i) {
-        matrix[i][i] += value;
-    }
-}
-
-Matrix zeroMatrix() {
-    Matrix matrix;
-    scaleElements(matrix, 0.0);
-    return matrix;
-}
-
-/// From a point of the mesh at rest to where a cluster's link takes it.
-Matrix vertexTransform(FbxSdk& sdk, const Matrix& globalPosition, fbxsdk::FbxMesh& mesh, Cluster& cluster,
-                       fbxsdk::FbxNode& link, Cluster::ELinkMode mode, const fbxsdk::FbxTime& time) {
-    Matrix referenceInit, referenceCurrent, linkInit;
-    fbxsdk::FbxNode* associate = mode == Cluster::eAdditive ? cluster.GetAssociateModel() : nullptr;
-    if (associate != nullptr) {
-        cluster.GetTransformAssociateModelMatrix(referenceInit);
-        referenceCurrent = detail::globalTransform(*associate, time) * sdk.getGeometry(associate);
-    } else {
-        cluster.GetTransformMatrix(referenceInit);
-        referenceInit = referenceInit * sdk.getGeometry(mesh.GetNode());
-        referenceCurrent = globalPosition;
-    }
-    cluster.GetTransformLinkMatrix(linkInit);
-    const Matrix linkCurrent = detail::globalTransform(link, time);
-    return (linkCurrent.Inverse() * referenceCurrent).Inverse() * (linkInit.Inverse() * referenceInit);
-}
-
-/// What the clusters of a mesh do to each of its points, summed up.
-struct SkinSums {
-    std::vector<Matrix> deformations;
-    std::vector<double> weights;
-
-    SkinSums(std::size_t pointCount, Cluster::ELinkMode mode)
-        : deformations(pointCount, mode == Cluster::eAdditive ? Matrix() : zeroMatrix()), weights(pointCount, 0.0) {}
-};
-
-/// Adds one cluster. Indices that are no points of the mesh are passed over.
-void addCluster(const Cluster& cluster, const Matrix& transform, Cluster::ELinkMode mode, SkinSums& sums) {
-    const int* indices = cluster.GetControlPointIndices();
-    const double* weights = cluster.GetControlPointWeights();
-    const int count = indices != nullptr && weights != nullptr ? cluster.GetControlPointIndicesCount() : 0;
-    for (int i = 0; i < count; ++i) {
-        const double weight = weights[i];
-        if (std::fabs(weight) < kWeightThreshold || indices[i] < 0 ||
-            static_cast<std::size_t>(indices[i]) >= sums.weights.size()) {
-            continue;
-        }
-        const auto point = static_cast<std::size_t>(indices[i]);
-        Matrix influence = transform;
-        scaleElements(influence, weight);
-        if (mode == Cluster::eAdditive) {
-            addToDiagonal(influence, 1.0 - weight);
-            sums.deformations[point] = influence * sums.deformations[point];
-            sums.weights[point] = 1.0;
-        } else {
-            addElements(sums.deformations[point], influence);
-            sums.weights[point] += weight;
-        }
-    }
-}
-
-/// kept: a total of exactly the threshold leaves the point alone, while a weight of exactly the threshold counts
-void applySkin(const SkinSums& sums, Cluster::ELinkMode mode, Point* points) {
-    for (std::size_t i = 0; i < sums.weights.size(); ++i) {
-        const double weight = sums.weights[i];
-        if (!(std::fabs(weight) > kWeightThreshold)) {
-            continue;
-        }
-        const Point source = points[i];
-        points[i] = sums.deformations[i].MultT(source);
-        if (mode == Cluster::eNormalize) {
-            points[i] /= weight;
-        } else if (mode == Cluster::eTotalOne) {
-            points[i] += source * (1.0 - weight);
-        }
-    }
 }
 
 /// Adds the way from the base to a target, times the weight, to every point that both have.
@@ -270,22 +145,6 @@ void FbxSdk::computeShapeDeformation(fbxsdk::FbxNode* /*node*/, fbxsdk::FbxMesh*
     }
 }
 
-void FbxSdk::computeClusterDeformation(fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
-                                       fbxsdk::FbxVector4* points) {
-    if (mesh == nullptr || points == nullptr) {
-        return;
-    }
-    const Cluster::ELinkMode mode = linkModeOf(*mesh);
-    SkinSums sums(static_cast<std::size_t>(mesh->GetControlPointsCount()), mode);
-    forEachCluster(*mesh, [&](Cluster& cluster) {
-        if (fbxsdk::FbxNode* link = cluster.GetLink()) {
-            const Matrix transform = vertexTransform(*this, globalPosition, *mesh, cluster, *link, mode, time);
-            addCluster(cluster, transform, mode, sums);
-        }
-    });
-    applySkin(sums, mode, points);
-}
-
 bool FbxSdk::openClosePointCacheData(fbxsdk::FbxScene* scene, bool open) {
     if (scene == nullptr) {
         return fail("no scene to open point caches of");
@@ -309,11 +168,5 @@ bool FbxSdk::openClosePointCacheData(fbxsdk::FbxScene* scene, bool open) {
     }
     return true; // closing comes after the work, whose failure stays noted
 }
-
-void FbxSdk::matrixScale(fbxsdk::FbxAMatrix& matrix, double factor) { scaleElements(matrix, factor); }
-
-void FbxSdk::matrixAddToDiagonal(fbxsdk::FbxAMatrix& matrix, double value) { addToDiagonal(matrix, value); }
-
-void FbxSdk::matrixAdd(fbxsdk::FbxAMatrix& matrix, fbxsdk::FbxAMatrix& other) { addElements(matrix, other); }
 
 } // namespace Tarnell::Fbx

@@ -66,29 +66,32 @@ std::int64_t polygonVertexCount(const fbxsdk::FbxMesh& source) {
     return count;
 }
 
-/// Calls `visit(corner)` for every vertex of every polygon, in order.
-template <class Visit>
-void forEachCorner(const fbxsdk::FbxMesh& source, Visit&& visit) {
+void fillLayout(const fbxsdk::FbxMesh& source, MeshArrays& arrays) {
     const int* vertices = source.GetPolygonVertices();
-    int polygonVertex = 0;
+    int* sizes = arrays.polygonVertexSizes();
+    int* pointIndex = arrays.pointIndices();
     const int polygonCount = source.GetPolygonCount();
     for (int polygon = 0; polygon < polygonCount; ++polygon) {
         const int size = source.GetPolygonSize(polygon);
         const int start = source.GetPolygonVertexIndex(polygon);
+        *sizes++ = size;
         for (int vertex = 0; vertex < size; ++vertex) {
-            const int controlPoint = vertices != nullptr && start >= 0 ? vertices[start + vertex] : -1;
-            visit(Corner{polygon, polygonVertex++, controlPoint});
+            *pointIndex++ = vertices != nullptr && start >= 0 ? vertices[start + vertex] : -1;
         }
     }
 }
 
-void fillLayout(const fbxsdk::FbxMesh& source, MeshArrays& arrays) {
-    int* const sizes = arrays.polygonVertexSizes();
-    for (int polygon = 0; polygon < source.GetPolygonCount(); ++polygon) {
-        sizes[polygon] = source.GetPolygonSize(polygon);
+/// Calls `visit(corner)` for every vertex of every polygon, in order. The layout must be filled.
+template <class Visit>
+void forEachCorner(MeshArrays& arrays, int polygonCount, Visit&& visit) {
+    const int* const sizes = arrays.polygonVertexSizes();
+    const int* const pointIndices = arrays.pointIndices();
+    int polygonVertex = 0;
+    for (int polygon = 0; polygon < polygonCount; ++polygon) {
+        for (const int end = polygonVertex + sizes[polygon]; polygonVertex < end; ++polygonVertex) {
+            visit(Corner{polygon, polygonVertex, pointIndices[polygonVertex]});
+        }
     }
-    int* const pointIndices = arrays.pointIndices();
-    forEachCorner(source, [&](const Corner& corner) { pointIndices[corner.polygonVertex] = corner.controlPoint; });
 }
 
 /// The normals of a layer; whether it has any.
@@ -98,16 +101,15 @@ bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const f
     const fbxsdk::FbxVector4 missing(static_cast<double>(TnFbxMesh::kDefaultMeshNX),
                                      static_cast<double>(TnFbxMesh::kDefaultMeshNY),
                                      static_cast<double>(TnFbxMesh::kDefaultMeshNZ));
-    auto* const normals = arrays.normals();
     bool found = false;
-    forEachCorner(source, [&](const Corner& corner) {
+    forEachCorner(arrays, source.GetPolygonCount(), [&](const Corner& corner) {
         const std::optional<fbxsdk::FbxVector4> value = stored.at(corner);
         found = found || value.has_value();
         fbxsdk::FbxVector4 normal = value.value_or(missing);
         if (bake != nullptr) {
             normal = bake->MultT(normal);
         }
-        normals[corner.polygonVertex] = {toFloat(normal[0]), toFloat(normal[1]), toFloat(normal[2])};
+        arrays.addNormal({toFloat(normal[0]), toFloat(normal[1]), toFloat(normal[2])});
     });
     return found;
 }
@@ -115,13 +117,14 @@ bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const f
 /// The texture coordinates of a layer; whether it has any.
 bool fillUVs(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, MeshArrays& arrays) {
     const detail::CornerValues<fbxsdk::FbxVector2> stored = detail::layerUVs(layer);
-    auto* const uvs = arrays.uvs();
+    const fbxsdk::FbxVector2 missing(static_cast<double>(TnFbxMesh::kDefaultMeshU),
+                                     static_cast<double>(TnFbxMesh::kDefaultMeshV));
     bool found = false;
-    forEachCorner(source, [&](const Corner& corner) {
-        if (const std::optional<fbxsdk::FbxVector2> uv = stored.at(corner)) {
-            found = true;
-            uvs[corner.polygonVertex] = {toFloat((*uv)[0]), toFloat((*uv)[1])};
-        }
+    forEachCorner(arrays, source.GetPolygonCount(), [&](const Corner& corner) {
+        const std::optional<fbxsdk::FbxVector2> value = stored.at(corner);
+        found = found || value.has_value();
+        const fbxsdk::FbxVector2 uv = value.value_or(missing);
+        arrays.addUV({toFloat(uv[0]), toFloat(uv[1])});
     });
     return found;
 }
@@ -145,7 +148,7 @@ bool fillColours(fbxsdk::FbxMesh& source, MeshArrays& arrays) {
             continue; // the defaults will do
         }
         auto* const target = arrays.colours();
-        forEachCorner(source, [&](const Corner& corner) {
+        forEachCorner(arrays, source.GetPolygonCount(), [&](const Corner& corner) {
             const std::optional<detail::Colour> stored = colours.at(corner);
             found = found || stored.has_value();
             const detail::Colour colour = stored.value_or(kDefaultColour);

@@ -230,12 +230,19 @@ void CurveKeys::setAttributes(std::size_t key, const KeyAttributes& keyAttribute
         attributeOfKey[key] = attributeOfKey[key - 1];
         return;
     }
-    if (attributes.empty() || !(attributes.back() == keyAttributes)) {
-        if (attributes.size() > 2 * attributeOfKey.size()) {
-            compactAttributes(*this);
+    // A key that is added and then set has two kinds of attributes, in turn with the ones of the keys before.
+    constexpr std::size_t kLatest = 4;
+    const std::size_t oldest = attributes.size() - std::min(attributes.size(), kLatest);
+    for (std::size_t i = attributes.size(); i > oldest; --i) {
+        if (attributes[i - 1] == keyAttributes) {
+            attributeOfKey[key] = static_cast<std::uint32_t>(i - 1);
+            return;
         }
-        attributes.push_back(keyAttributes);
     }
+    if (attributes.size() > 2 * attributeOfKey.size()) {
+        compactAttributes(*this);
+    }
+    attributes.push_back(keyAttributes);
     attributeOfKey[key] = static_cast<std::uint32_t>(attributes.size() - 1);
 }
 

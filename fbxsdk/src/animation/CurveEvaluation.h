@@ -91,8 +91,8 @@ struct CurveKeys {
         const std::size_t index = key < attributeOfKey.size() ? attributeOfKey[key] : attributes.size();
         return index < attributes.size() ? attributes[index] : kDefaultAttributes;
     }
-    /// Gives a key these attributes, sharing them with the key before or the last ones added when those are equal. The
-    /// key must have its place in `attributeOfKey`.
+    /// Gives a key these attributes, sharing them with the key before or the latest ones added when those are equal.
+    /// The key must have its place in `attributeOfKey`.
     void setAttributes(std::size_t key, const KeyAttributes& keyAttributes);
 };
 

@@ -10,7 +10,6 @@
 #include <limits>
 
 #include "container/ByteOrder.h"
-#include "container/ZlibStream.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -189,9 +188,9 @@ void BinarySink::packedArray(char code, std::span<const Number> values) {
     }
     std::vector<char> swapped;
     std::span<const char> bytes = fileBytes(values, swapped);
-    std::vector<char> stream;
+    std::span<const char> stream;
     if (bytes.size() >= kShortestCompressed) {
-        stream = deflated(bytes);
+        stream = mDeflater.deflated(bytes);
     }
     const bool compressed = !stream.empty();
     if (compressed) {

@@ -10,6 +10,7 @@
 #include "container/ByteOutput.h"
 #include "container/FileId.h"
 #include "container/RecordSink.h"
+#include "container/ZlibStream.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -82,6 +83,7 @@ private:
     std::uint64_t mMaxSize;
     std::string mFault;
     std::vector<OpenRecord> mOpen;
+    Deflater mDeflater;
 };
 
 } // namespace detail

@@ -4,7 +4,9 @@
 // The only place that knows the compression library.
 #pragma once
 
+#include <array>
 #include <cstdint>
+#include <memory>
 #include <span>
 #include <vector>
 
@@ -21,8 +23,33 @@ inline constexpr std::uint64_t kMaxDeflateRatio = 1032;
 /// False when the stream is corrupt or holds fewer or more bytes; the destination is then undefined.
 [[nodiscard]] bool inflateExactly(std::span<const char> stream, std::span<char> destination);
 
-/// Deflates bytes into a zlib stream. Empty when the stream would not be smaller than the bytes.
-[[nodiscard]] std::vector<char> deflated(std::span<const char> bytes);
+/// Deflates one array after the other into zlib streams. Animation repeats itself, most of all the times of its keys:
+/// what was deflated a moment ago is not deflated again.
+class Deflater {
+public:
+    Deflater();
+    Deflater(const Deflater&) = delete;
+    Deflater& operator=(const Deflater&) = delete;
+    ~Deflater();
+
+    /// The stream of the bytes, until the next call. Empty when it would not be smaller than the bytes.
+    [[nodiscard]] std::span<const char> deflated(std::span<const char> bytes);
+
+private:
+    struct Kept {
+        std::vector<char> bytes, stream;
+    };
+
+    [[nodiscard]] const Kept* find(std::span<const char> bytes) const;
+    [[nodiscard]] std::span<const char> deflatedAnew(std::span<const char> bytes);
+
+    struct Compressor;
+    std::unique_ptr<Compressor> mCompressor;
+    std::unique_ptr<char[]> mMemory; ///< of the last stream; nobody clears it
+    std::size_t mMemorySize = 0;
+    std::array<Kept, 8> mKept;
+    std::size_t mOldest = 0; ///< of those that are kept
+};
 
 } // namespace detail
 FBXSDK_NAMESPACE_END
