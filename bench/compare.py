@@ -1,13 +1,15 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-"""Compares reading with Tarnell FBX and with assimp, and prints a table in Markdown.
+"""Compares reading and writing with Tarnell FBX and with assimp, and prints tables in Markdown.
 
 Each workload runs as a pair of processes, ours and the peer's in turn, so that both meet the same state of the
-machine. The answers are proven equal first; what is reported is the median time of the read call, the median peak of
-resident memory of the process, and their ratios.
+machine. The answers are proven equal first, for written files by reading them; what is reported is the median time of
+the read or write call, the median peak of resident memory of the process, the size of written files, and their ratios.
 
     compare.py BUILD_FOLDER INPUT_FOLDER [--repetitions N]
+
+Written files go to INPUT_FOLDER, too, and are removed.
 """
 import argparse
 import json
@@ -44,11 +46,28 @@ WORKLOADS = [
 ]
 
 
+@dataclass(frozen=True)
+class Written:
+    title: str
+    mode: str
+    goal: str
+    read_mode: str  # in which the written file is read, to compare what is in it
+
+
+WRITTEN = [
+    Written("mesh of 2,000,000 polygon vertices, binary", "mesh", "time ≤ 0.5", "mesh"),
+    Written("the same, ASCII", "meshAscii", "time ≤ 0.5", "mesh"),
+    Written("500 nodes, a key on each of 2,000 frames, binary", "nodes", "", "local"),
+    Written("the same, ASCII", "nodesAscii", "", "local"),
+]
+
+
 @dataclass
 class Run:
     answer: dict
     seconds: float
     megabytes: float
+    file_megabytes: float = 0.0
 
 
 def run(program: Path, mode: str, file: Path) -> Run:
@@ -62,7 +81,7 @@ def run(program: Path, mode: str, file: Path) -> Run:
     return Run(answer, answer.pop("seconds"), usage.ru_maxrss / 1024)
 
 
-def prove_equal(workload: Workload, ours: dict, theirs: dict) -> None:
+def prove_equal(workload: Workload | Written, ours: dict, theirs: dict) -> None:
     equal = ours["count"] == theirs["count"] and all(
         abs(a - b) <= BOX_TOLERANCE for key in ("minimum", "maximum") for a, b in zip(ours[key], theirs[key]))
     if not equal:
@@ -80,21 +99,42 @@ def measure(workload: Workload, build: Path, inputs: Path, repetitions: int) -> 
     return ours, theirs
 
 
+def measure_writing(workload: Written, build: Path, folder: Path, repetitions: int) -> tuple[list[Run], list[Run]]:
+    runs = {"tarnell": [], "assimp": []}
+    for repetition in range(repetitions):
+        answers = []
+        for program, results in runs.items():
+            file = folder / f"written_by_{program}.fbx"
+            result = run(build / "bench" / f"bench_write_{program}", workload.mode, file)
+            result.file_megabytes = file.stat().st_size / 1e6
+            results.append(result)
+            if repetition == 0:
+                answers.append(run(build / "bench" / "bench_read_tarnell", workload.read_mode, file).answer)
+            file.unlink()
+        if answers:
+            prove_equal(workload, *answers)
+    return runs["tarnell"], runs["assimp"]
+
+
 def spread(values: list[float]) -> float:
     return (max(values) - min(values)) / statistics.median(values)
 
 
-def row(workload: Workload, ours: list[Run], theirs: list[Run]) -> str:
-    def cells(value, unit):
-        mine = statistics.median(value(r) for r in ours)
-        if not theirs:
-            return f"{mine:{unit}} | – | –"
-        peer = statistics.median(value(r) for r in theirs)
-        return f"{mine:{unit}} | {peer:{unit}} | **{mine / peer:.2f}**"
+def cells(ours: list[Run], theirs: list[Run], value, unit: str) -> str:
+    mine = statistics.median(value(r) for r in ours)
+    if not theirs:
+        return f"{mine:{unit}} | – | –"
+    peer = statistics.median(value(r) for r in theirs)
+    return f"{mine:{unit}} | {peer:{unit}} | **{mine / peer:.2f}**"
 
+
+def row(workload: Workload | Written, ours: list[Run], theirs: list[Run]) -> str:
     noise = max(spread([r.seconds for r in runs]) for runs in (ours, theirs) if runs)
-    return (f"| {workload.title} | {cells(lambda r: r.seconds * 1000, '.1f')} | {noise:.0%} "
-            f"| {cells(lambda r: r.megabytes, '.0f')} | {workload.goal} |")
+    line = (f"| {workload.title} | {cells(ours, theirs, lambda r: r.seconds * 1000, '.1f')} | {noise:.0%} "
+            f"| {cells(ours, theirs, lambda r: r.megabytes, '.0f')} ")
+    if isinstance(workload, Written):
+        line += f"| {cells(ours, theirs, lambda r: r.file_megabytes, '.0f')} "
+    return line + f"| {workload.goal} |"
 
 
 def processor() -> str:
@@ -119,6 +159,12 @@ def main() -> None:
     print("|---|---:|---:|---:|---:|---:|---:|---:|---|")
     for workload in WORKLOADS:
         print(row(workload, *measure(workload, options.build, options.inputs, options.repetitions)), flush=True)
+
+    print("\n| written | ours, ms | assimp, ms | ratio | spread | ours, MB | assimp, MB | ratio "
+          "| ours, file MB | assimp, file MB | ratio | goal |")
+    print("|---|---:|---:|---:|---:|---:|---:|---:|---:|---:|---:|---|")
+    for written in WRITTEN:
+        print(row(written, *measure_writing(written, options.build, options.inputs, options.repetitions)), flush=True)
 
 
 if __name__ == "__main__":

@@ -56,9 +56,11 @@ void setPoints(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
 template <class Array, class ValueAt>
 void fillArray(Array& array, int count, ValueAt valueAt) {
     array.SetCount(count);
+    auto* items = array.GetLocked();
     for (int i = 0; i < count; ++i) {
-        array.SetAt(i, valueAt(i));
+        items[i] = valueAt(i);
     }
+    array.Release(&items);
 }
 
 void setNormals(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer& layer) {

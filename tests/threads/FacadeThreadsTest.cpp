@@ -77,6 +77,55 @@ TEST(FacadeThreads, WriteFilesOfTheirOwnAtTheSameTime) {
     }
 }
 
+/// Squares in a row, enough of them that their arrays are written at the same time.
+void fillStrip(TnFbxMesh& mesh, int squares) {
+    ASSERT_TRUE(mesh.allocateGeometryData(squares, 2 * squares + 2, 4 * squares));
+    for (int i = 0; i < mesh.getNumberOfControlPoints(); ++i) {
+        mesh.setControlPoint(i, static_cast<float>(i / 2), static_cast<float>(i % 2), 0.0f);
+    }
+    for (int square = 0; square < squares; ++square) {
+        mesh.setPolygonVertexSize(square, 4);
+        for (int corner = 0; corner < 4; ++corner) {
+            const int at = 4 * square + corner;
+            mesh.setPointIndex(at, 2 * square + (corner == 1 ? 2 : corner == 2 ? 3 : corner / 3));
+            mesh.setNormal(at, 0.0f, 0.0f, 1.0f);
+            mesh.setUV(at, static_cast<float>(square), static_cast<float>(corner));
+            mesh.setColour(at, 0.25f, 0.5f, 0.75f, 1.0f);
+        }
+    }
+    mesh.setValidNormals(true);
+    mesh.setValidUVs(true);
+    mesh.setValidColours(true);
+}
+
+TEST(FacadeThreads, WriteTheArraysOfALargeMeshAtTheSameTime) {
+    constexpr int kSquares = 20'000;
+    const TemporaryFolder folder;
+    TnFbxMesh mesh;
+    mesh.setName("strip");
+    fillStrip(mesh, kSquares);
+    TnFbxWriteInfo info;
+    info.setFileName(folder.file("strip.fbx"));
+    info.setAnimationStackName("walk");
+    info.setAnimateMeshVertices(false);
+    EXPECT_TRUE(Fbx().writeFile(info, {}, {}, {}, {}, {&mesh})) << lastError();
+
+    FacadeRead<TnFbxMesh> meshes(folder.file("strip.fbx"));
+    const TnFbxMesh& back = meshes["strip"];
+    ASSERT_EQ(back.getNumberOfPolygonVertices(), 4 * kSquares);
+    for (int at = 0; at < 4 * kSquares; ++at) {
+        float x = 0.0f, y = 0.0f, z = 0.0f, w = 0.0f;
+        ASSERT_EQ(back.getPointIndex(at), mesh.getPointIndex(at));
+        ASSERT_TRUE(back.getNormal(at, x, y, z));
+        ASSERT_EQ(z, 1.0f);
+        ASSERT_TRUE(back.getUV(at, x, y));
+        ASSERT_EQ(x, static_cast<float>(at / 4));
+        ASSERT_EQ(y, static_cast<float>(at % 4));
+        ASSERT_TRUE(back.getColour(at, x, y, z, w));
+        ASSERT_EQ(y, 0.5f);
+    }
+}
+
 TEST(FacadeThreads, HaveALastErrorEach) {
     onAllThreads([](int thread) {
         const std::string missing = "missing" + std::to_string(thread) + ".fbx";

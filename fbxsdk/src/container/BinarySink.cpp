@@ -8,8 +8,10 @@
 #include <cassert>
 #include <cstring>
 #include <limits>
+#include <memory>
 
 #include "container/ByteOrder.h"
+#include "core/Parallel.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -67,6 +69,9 @@ BinarySink::BinarySink(ByteOutput& output, std::uint32_t version, std::uint64_t 
     mOutput.write(versionBytes);
 }
 
+BinarySink::BinarySink(ByteOutput& output, const BinarySink& whole)
+    : mOutput(output), mVersion(whole.mVersion), mWide(whole.mWide), mMaxSize(whole.mMaxSize), mIsFragment(true) {}
+
 std::size_t BinarySink::headSize() const { return mWide ? 25 : 13; }
 
 void BinarySink::setFault(const std::string& fault) {
@@ -108,12 +113,16 @@ void BinarySink::endRecord() {
     } else {
         record.valuesEnd = mOutput.size();
     }
+    checkSize();
+    if (!failed()) {
+        patchHead(record);
+    }
+}
+
+void BinarySink::checkSize() {
     if (mOutput.size() > mMaxSize) {
         setFault("the file outgrows the " + std::to_string(mMaxSize) + " bytes that a binary file of version " +
                  std::to_string(mVersion) + " can have; version " + std::to_string(kFirstWideVersion) + " can");
-    }
-    if (!failed()) {
-        patchHead(record);
     }
 }
 
@@ -122,15 +131,55 @@ void BinarySink::patchHead(const OpenRecord& record) {
     char head[3 * sizeof(std::uint64_t)];
     std::size_t size = 0;
     for (const std::uint64_t field : fields) {
-        if (mWide) {
-            storeNumber(head + size, field);
-            size += sizeof field;
-        } else {
-            storeNumber(head + size, static_cast<std::uint32_t>(field));
-            size += sizeof(std::uint32_t);
-        }
+        size += storeOffset(head + size, field);
     }
     mOutput.overwrite(record.start, std::span(head, size));
+    if (mIsFragment) {
+        mHeads.push_back(record.start);
+    }
+}
+
+/// An offset or a count as heads have them; how many bytes that is.
+std::size_t BinarySink::storeOffset(char* bytes, std::uint64_t offset) const {
+    if (mWide) {
+        storeNumber(bytes, offset);
+        return sizeof offset;
+    }
+    storeNumber(bytes, static_cast<std::uint32_t>(offset));
+    return sizeof(std::uint32_t);
+}
+
+// What takes long is to deflate arrays. Each part becomes a fragment of a file with offsets of its own, to which the
+// place where it comes to stand is added in the end: the bytes are those of parts that are written one after the other.
+void BinarySink::parts(std::span<const Part> list) {
+    assert(mOpen.empty() || mOpen.back().hasBlock);
+    std::vector<MemoryOutput> outputs(list.size());
+    std::vector<std::unique_ptr<BinarySink>> fragments;
+    for (MemoryOutput& output : outputs) {
+        fragments.emplace_back(new BinarySink(output, *this));
+    }
+    forEachInParallel(list.size(), [&](std::size_t i) { list[i](*fragments[i]); });
+    for (std::size_t i = 0; i < list.size(); ++i) {
+        append(*fragments[i], outputs[i].takeBytes());
+        fragments[i].reset();
+    }
+}
+
+void BinarySink::append(const BinarySink& fragment, std::string bytes) {
+    const bool swap = needsSwap(/*bigEndian*/ false);
+    const std::uint64_t place = mOutput.size();
+    for (const std::uint64_t head : fragment.mHeads) {
+        char* const end = bytes.data() + head;
+        if (mIsFragment) {
+            mHeads.push_back(place + head);
+        }
+        storeOffset(end, place + (mWide ? loadNumber<std::uint64_t>(end, swap) : loadNumber<std::uint32_t>(end, swap)));
+    }
+    mOutput.write(bytes);
+    if (!fragment.mFault.empty()) {
+        setFault(fragment.mFault);
+    }
+    checkSize();
 }
 
 template <class Number>

@@ -47,6 +47,8 @@ public:
     void array(std::span<const std::uint8_t> values) override;
     void floatBits(std::span<const std::uint32_t> words) override;
 
+    void parts(std::span<const Part> list) override;
+
     [[nodiscard]] bool failed() const override { return !mFault.empty() || mOutput.failed(); }
     /// What cannot be written in this version; empty when nothing is wrong but perhaps the output.
     [[nodiscard]] const std::string& fault() const { return mFault; }
@@ -55,6 +57,9 @@ public:
     void finish(const CreationTime& time);
 
 private:
+    /// For records that will stand somewhere in the file of another sink.
+    BinarySink(ByteOutput& output, const BinarySink& whole);
+
     struct OpenRecord {
         std::uint64_t start;
         std::uint64_t valuesStart;
@@ -65,7 +70,10 @@ private:
 
     [[nodiscard]] std::size_t headSize() const;
     void setFault(const std::string& fault);
+    void checkSize();
     void patchHead(const OpenRecord& record);
+    void append(const BinarySink& fragment, std::string bytes);
+    std::size_t storeOffset(char* bytes, std::uint64_t offset) const;
     void writeZeros(std::size_t count);
     template <class Number>
     void scalar(char code, Number value);
@@ -83,6 +91,8 @@ private:
     std::uint64_t mMaxSize;
     std::string mFault;
     std::vector<OpenRecord> mOpen;
+    bool mIsFragment = false;
+    std::vector<std::uint64_t> mHeads; ///< of a fragment: where its records begin
     Deflater mDeflater;
 };
 

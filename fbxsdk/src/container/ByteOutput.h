@@ -9,6 +9,7 @@
 #include <cstring>
 #include <span>
 #include <string>
+#include <utility>
 
 #include <fbxsdk/FbxArch.h>
 
@@ -43,6 +44,8 @@ public:
     [[nodiscard]] bool failed() const override { return false; }
 
     [[nodiscard]] const std::string& bytes() const { return mBytes; }
+    /// Leaves none.
+    [[nodiscard]] std::string takeBytes() { return std::exchange(mBytes, {}); }
 
 private:
     std::string mBytes;

@@ -6,6 +6,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <span>
 #include <string_view>
 
@@ -58,6 +59,15 @@ public:
     virtual void array(std::span<const std::uint8_t> values) = 0;
     /// 32-bit words that files keep as the bits of floats: the packed data of keys.
     virtual void floatBits(std::span<const std::uint32_t> words) = 0;
+
+    /// Writes whole records, one after the other.
+    using Part = std::function<void(RecordSink& sink)>;
+    /// Parts in this order. A sink may have several of them written at the same time: they must not change anything
+    /// that they share, nor use any other sink than the one that they get.
+    virtual void parts(std::span<const Part> list) {
+        for (const Part& part : list)
+            part(*this);
+    }
 
     /// A heading between top-level records, for human readers.
     virtual void heading(std::string_view) {}

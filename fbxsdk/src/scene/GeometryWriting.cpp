@@ -47,12 +47,27 @@ bool hasEdges(FbxGeometryBase& geometry) {
     return mesh && mesh->GetPolygonCount() > 0 && mesh->edges().count() > 0;
 }
 
-void writeMesh(FbxMesh& mesh, RecordSink& sink) {
-    writeArray<double>(sink, "Vertices", packedPoints(mesh));
+void writePolygons(FbxMesh& mesh, RecordSink& sink) {
     writeArray<std::int32_t>(sink, "PolygonVertexIndex", closedPolygons(mesh));
     if (hasEdges(mesh))
         writeArray<std::int32_t>(sink, "Edges", {mesh.edges().data(), static_cast<std::size_t>(mesh.edges().count())});
     writeInteger(sink, "GeometryVersion", kGeometryVersion);
+}
+
+/// Everything but the layers.
+std::vector<RecordSink::Part> partsOf(FbxGeometryBase& geometry) {
+    auto* mesh = FbxCast<FbxMesh>(&geometry);
+    if (!mesh)
+        return {[&geometry](RecordSink& sink) { writeNurbsRecords(geometry, sink); }};
+    return {[mesh](RecordSink& sink) { writeArray<double>(sink, "Vertices", packedPoints(*mesh)); },
+            [mesh](RecordSink& sink) { writePolygons(*mesh, sink); }};
+}
+
+/// Smaller meshes are written before a thread has begun.
+bool isLarge(FbxGeometryBase& geometry) {
+    constexpr int kFewestCorners = 1 << 16;
+    const auto* mesh = FbxCast<FbxMesh>(&geometry);
+    return mesh && mesh->GetPolygonVertexCount() >= kFewestCorners;
 }
 
 /// What a shape changes about its base: points that it moves, and by how much.
@@ -96,11 +111,7 @@ void writeGeometryRecords(FbxGeometryBase& geometry, const VersionTraits& traits
         writeShapeRecords(*shape, traits, sink);
         return;
     }
-    if (auto* mesh = FbxCast<FbxMesh>(&geometry))
-        writeMesh(*mesh, sink);
-    else
-        writeNurbsRecords(geometry, sink);
-    writeLayers(geometry, hasEdges(geometry), traits, sink);
+    writeWithLayers(partsOf(geometry), geometry, hasEdges(geometry), traits, sink, isLarge(geometry));
     writeRecordsBehindLayers(geometry, sink);
 }
 

@@ -4,6 +4,8 @@
 // The records of geometry and of what deforms it.
 #pragma once
 
+#include <vector>
+
 #include <fbxsdk/FbxGeometryBase.h>
 #include <fbxsdk/FbxMesh.h>
 #include <fbxsdk/FbxShape.h>
@@ -23,7 +25,9 @@ void writeDeformerVersion(const FbxObject& deformer, const VersionTraits& traits
 void writeDeformerRecords(FbxObject& deformer, const VersionTraits& traits, RecordSink& sink);
 
 /// The elements and layers of a geometry. Without edges there are no elements that are mapped by them.
-void writeLayers(FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits, RecordSink& sink);
+/// `atOnce` lets the sink write the parts and the elements at the same time, where elements are not shared.
+void writeWithLayers(std::vector<RecordSink::Part> parts, const FbxLayerContainer& container, bool hasEdges,
+                     const VersionTraits& traits, RecordSink& sink, bool atOnce);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

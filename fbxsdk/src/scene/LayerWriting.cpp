@@ -249,14 +249,27 @@ std::string_view referenceName(const Element& element, Reference reference) {
 
 class LayerWriter {
 public:
-    LayerWriter(FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits, RecordSink& sink)
-        : mContainer(container), mHasEdges(hasEdges), mTraits(traits), mSink(sink), mKinds(allKinds()) {}
+    LayerWriter(const FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits)
+        : mContainer(container), mHasEdges(hasEdges), mTraits(traits), mKinds(allKinds()) {}
 
-    void write() {
+    /// A part for each element, and one for the layers.
+    std::vector<RecordSink::Part> parts() {
+        std::vector<RecordSink::Part> list;
         for (const ElementKind& kind : mKinds)
-            writeElements(kind);
-        for (int i = 0; i < mContainer.GetLayerCount(); ++i)
-            writeLayer(i);
+            addElements(kind, list);
+        list.emplace_back([this](RecordSink& sink) {
+            for (int i = 0; i < mContainer.GetLayerCount(); ++i)
+                writeLayer(i, sink);
+        });
+        return list;
+    }
+
+    /// Whether an element stands in two slots, so that two parts read it.
+    [[nodiscard]] bool hasSharedElements() const {
+        std::set<const Element*> elements;
+        for (const auto& [elementAndSlot, number] : mNumbers)
+            elements.insert(elementAndSlot.first);
+        return elements.size() < mNumbers.size();
     }
 
 private:
@@ -267,57 +280,66 @@ private:
     }
 
     /// An element that stands in several layers is written once.
-    void writeElements(const ElementKind& kind) {
+    void addElements(const ElementKind& kind, std::vector<RecordSink::Part>& list) {
         std::int32_t count = 0;
         for (int i = 0; i < mContainer.GetLayerCount(); ++i) {
             const Element* element = elementAt(*mContainer.GetLayer(i), kind.slot);
             if (!element || mNumbers.count({element, kind.slot}) > 0)
                 continue;
             mNumbers[{element, kind.slot}] = count;
-            writeElement(kind, *element, count++);
+            list.emplace_back(
+                [this, &kind, element, count](RecordSink& sink) { writeElement(kind, *element, count, sink); });
+            ++count;
         }
     }
 
-    void writeElement(const ElementKind& kind, const Element& element, std::int32_t number) {
+    void writeElement(const ElementKind& kind, const Element& element, std::int32_t number, RecordSink& sink) const {
         const int version = kind.version == 0 ? mTraits.normalVersion : kind.version;
-        const BlockScope block(mSink, kind.record, number);
-        writeInteger(mSink, "Version", mTraits.idsAndTemplates ? version : kind.legacyVersion);
-        writeText(mSink, "Name", element.GetName());
-        writeText(mSink, "MappingInformationType", mappingName(element.GetMappingMode()));
-        writeText(mSink, "ReferenceInformationType", referenceName(element, kind.reference));
+        const BlockScope block(sink, kind.record, number);
+        writeInteger(sink, "Version", mTraits.idsAndTemplates ? version : kind.legacyVersion);
+        writeText(sink, "Name", element.GetName());
+        writeText(sink, "MappingInformationType", mappingName(element.GetMappingMode()));
+        writeText(sink, "ReferenceInformationType", referenceName(element, kind.reference));
         try {
-            kind.write({element, mTraits, mSink});
+            kind.write({element, mTraits, sink});
         } catch (const std::runtime_error&) {
             // A damaged element has no array; it is written without, and read as if it were not there.
         }
     }
 
-    void writeLayer(int index) {
+    void writeLayer(int index, RecordSink& sink) const {
         const FbxLayer& layer = *mContainer.GetLayer(index);
-        const BlockScope block(mSink, "Layer", index);
-        writeInteger(mSink, "Version", 100);
+        const BlockScope block(sink, "Layer", index);
+        writeInteger(sink, "Version", 100);
         for (const ElementKind& kind : mKinds) {
             const Element* element = elementAt(layer, kind.slot);
             if (!element)
                 continue;
-            const BlockScope entry(mSink, "LayerElement");
-            writeText(mSink, "Type", kind.record);
-            writeInteger(mSink, "TypedIndex", mNumbers.at({element, kind.slot}));
+            const BlockScope entry(sink, "LayerElement");
+            writeText(sink, "Type", kind.record);
+            writeInteger(sink, "TypedIndex", mNumbers.at({element, kind.slot}));
         }
     }
 
-    FbxLayerContainer& mContainer;
+    const FbxLayerContainer& mContainer;
     bool mHasEdges;
     const VersionTraits& mTraits;
-    RecordSink& mSink;
     std::vector<ElementKind> mKinds;
     std::map<std::pair<const Element*, int>, std::int32_t> mNumbers; ///< of elements within their kind
 };
 
 } // namespace
 
-void writeLayers(FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits, RecordSink& sink) {
-    LayerWriter(container, hasEdges, traits, sink).write();
+void writeWithLayers(std::vector<RecordSink::Part> parts, const FbxLayerContainer& container, bool hasEdges,
+                     const VersionTraits& traits, RecordSink& sink, bool atOnce) {
+    LayerWriter layers(container, hasEdges, traits);
+    for (RecordSink::Part& part : layers.parts())
+        parts.push_back(std::move(part));
+    if (atOnce && !layers.hasSharedElements())
+        sink.parts(parts);
+    else
+        for (const RecordSink::Part& part : parts)
+            part(sink);
 }
 
 } // namespace detail

@@ -138,6 +138,16 @@ TEST(BinarySink, RefusesAFileTooLargeForNarrowHeads) {
     EXPECT_NE(sink.fault().find("7500"), std::string::npos) << sink.fault();
 }
 
+TEST(BinarySink, RefusesPartsThatTogetherAreTooLargeForNarrowHeads) {
+    MemoryOutput output;
+    BinarySink sink(output, 7400, /*maxNarrowSize*/ 100);
+
+    sink.parts(std::vector<RecordSink::Part>(4, emitCount));
+
+    EXPECT_TRUE(sink.failed());
+    EXPECT_NE(sink.fault().find("7500"), std::string::npos) << sink.fault();
+}
+
 TEST(BinarySink, KeepsAnySizeWithWideHeads) {
     MemoryOutput output;
     BinarySink sink(output, 7500, /*maxNarrowSize*/ 100);

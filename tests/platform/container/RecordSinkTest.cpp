@@ -6,7 +6,9 @@
 
 #include <bit>
 #include <cmath>
+#include <functional>
 #include <limits>
+#include <new>
 #include <random>
 #include <string>
 #include <vector>
@@ -275,6 +277,76 @@ TEST_P(SinkLayout, WritesListsOfAHundredThousandElements) {
     }
 
     EXPECT_EQ(arrayBack(numbers), numbers);
+}
+
+// ---- Parts ----
+
+/// A record with a block, of which every part has another size.
+void emitPart(RecordSink& sink, int number) {
+    sink.beginRecord("Part");
+    sink.integer(number);
+    sink.beginBlock();
+    sink.beginRecord("Numbers");
+    sink.array(std::span<const double>(std::vector<double>(static_cast<std::size_t>(number) * 100, 0.5 * number)));
+    sink.endRecord();
+    sink.beginRecord("Empty");
+    sink.beginBlock();
+    sink.endRecord();
+    sink.endRecord();
+}
+
+std::vector<RecordSink::Part> manyParts() {
+    std::vector<RecordSink::Part> parts;
+    for (int i = 0; i < 40; ++i)
+        parts.emplace_back([i](RecordSink& sink) { emitPart(sink, i); });
+    return parts;
+}
+
+void emitWhole(RecordSink& sink, const std::function<void()>& content) {
+    sink.beginRecord("Whole");
+    sink.beginBlock();
+    content();
+    sink.beginRecord("Last");
+    sink.integer(7);
+    sink.endRecord();
+    sink.endRecord();
+}
+
+TEST_P(SinkLayout, WritesPartsAsIfOneAfterTheOther) {
+    const std::string inTurn = bytesOf([](RecordSink& sink) {
+        emitWhole(sink, [&] {
+            for (const RecordSink::Part& part : manyParts())
+                part(sink);
+        });
+    });
+    const std::string atOnce = bytesOf([](RecordSink& sink) { emitWhole(sink, [&] { sink.parts(manyParts()); }); });
+
+    EXPECT_TRUE(inTurn == atOnce);
+}
+
+TEST_P(SinkLayout, WritesPartsOfParts) {
+    const std::string nested = bytesOf([](RecordSink& sink) {
+        const RecordSink::Part both[] = {[](RecordSink& first) { first.parts(manyParts()); },
+                                         [](RecordSink& second) { emitPart(second, 3); }};
+        sink.parts(both);
+    });
+    const std::string inTurn = bytesOf([](RecordSink& sink) {
+        for (const RecordSink::Part& part : manyParts())
+            part(sink);
+        emitPart(sink, 3);
+    });
+
+    EXPECT_TRUE(nested == inTurn);
+}
+
+TEST_P(SinkLayout, PassesOnWhatAPartThrows) {
+    const auto emit = [](RecordSink& sink) {
+        std::vector<RecordSink::Part> parts = manyParts();
+        parts[7] = [](RecordSink&) { throw std::bad_alloc(); };
+        sink.parts(parts);
+    };
+
+    EXPECT_THROW(bytesOf(emit), std::bad_alloc);
 }
 
 } // namespace
