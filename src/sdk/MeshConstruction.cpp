@@ -106,6 +106,8 @@ void setColours(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer
 
 /// Polygons without corners are left out; the next one goes on where they stand.
 void addPolygons(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
+    target.ReservePolygonCount(mesh.getNumberOfPolygons());
+    target.ReservePolygonVertexCount(mesh.getNumberOfPolygonVertices());
     int polygonVertex = 0;
     for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon) {
         const int size = mesh.getPolygonVertexSize(polygon);
