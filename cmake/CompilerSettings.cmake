@@ -13,7 +13,9 @@ endif()
 
 find_program(CCACHE_PROGRAM ccache)
 if(CCACHE_PROGRAM AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
-  set(CMAKE_CXX_COMPILER_LAUNCHER "${CCACHE_PROGRAM}")
+  # Without this, ccache leaves alone what includes a precompiled header.
+  set(CMAKE_CXX_COMPILER_LAUNCHER
+    "${CMAKE_COMMAND}" -E env CCACHE_SLOPPINESS=pch_defines,time_macros "${CCACHE_PROGRAM}")
 endif()
 
 # Specified results are bit-exact: no contraction into fused multiply-add, on any compiler.

@@ -18,6 +18,21 @@ function(tarnell_layer name)
   endif()
 endfunction()
 
+# To read GoogleTest takes longer than to compile most tests: the first test executable reads it for all.
+function(tarnell_precompile_test_headers name)
+  get_property(owner GLOBAL PROPERTY TARNELL_TEST_HEADERS_OWNER)
+  if(owner)
+    target_precompile_headers(${name} REUSE_FROM ${owner})
+    return()
+  endif()
+  target_precompile_headers(${name} PRIVATE <gmock/gmock.h> <gtest/gtest.h>)
+  if(CMAKE_CXX_COMPILER_ID MATCHES "Clang")
+    # A header that was read anew from the same text is the same, for ccache too.
+    target_compile_options(${name} PRIVATE "SHELL:-Xclang -fno-pch-timestamp")
+  endif()
+  set_property(GLOBAL PROPERTY TARNELL_TEST_HEADERS_OWNER ${name})
+endfunction()
+
 # tarnell_test(NAME FOLDER folder LINK target...): every *Test.cpp of the folder becomes one executable.
 function(tarnell_test name)
   cmake_parse_arguments(ARG "" "FOLDER" "LINK" ${ARGN})
@@ -31,6 +46,7 @@ function(tarnell_test name)
   target_link_libraries(${name} PRIVATE ${ARG_LINK} tarnell_settings GTest::gtest GTest::gmock GTest::gtest_main)
   # They run for moments: to optimise them takes longer than it saves.
   target_compile_options(${name} PRIVATE -O0)
+  tarnell_precompile_test_headers(${name})
   if(TARNELL_FBX_SANITIZE)
     # To start an instrumented program takes longer than most of its tests.
     add_test(NAME ${name} COMMAND ${name} --gtest_brief=1)

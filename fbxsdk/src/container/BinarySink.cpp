@@ -155,6 +155,7 @@ void BinarySink::parts(std::span<const Part> list) {
     assert(mOpen.empty() || mOpen.back().hasBlock);
     std::vector<MemoryOutput> outputs(list.size());
     std::vector<std::unique_ptr<BinarySink>> fragments;
+    fragments.reserve(list.size());
     for (MemoryOutput& output : outputs) {
         fragments.emplace_back(new BinarySink(output, *this));
     }
