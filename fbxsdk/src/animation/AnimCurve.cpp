@@ -41,6 +41,12 @@ const detail::KeyAttributes& attributesOf(const detail::CurveKeys& keys, int ind
     return hasKey(keys, index) ? keys.attributesOf(static_cast<std::size_t>(index)) : kDefaults;
 }
 
+/// The first key that is not before the time, or the number of keys.
+std::size_t placeOf(const detail::CurveKeys& keys, std::int64_t ticks) {
+    const auto found = std::lower_bound(keys.times.begin(), keys.times.end(), ticks);
+    return static_cast<std::size_t>(found - keys.times.begin());
+}
+
 /// Takes the key at the index out and puts it back where its new time belongs; a key already at that time gives way.
 void moveKey(detail::CurveKeys& keys, std::size_t index, std::int64_t ticks) {
     const float value = keys.values[index];
@@ -49,8 +55,7 @@ void moveKey(detail::CurveKeys& keys, std::size_t index, std::int64_t ticks) {
     keys.times.erase(at(keys.times, index));
     keys.values.erase(at(keys.values, index));
     keys.attributeOfKey.erase(at(keys.attributeOfKey, index));
-    const auto place =
-        static_cast<std::size_t>(std::lower_bound(keys.times.begin(), keys.times.end(), ticks) - keys.times.begin());
+    const std::size_t place = placeOf(keys, ticks);
     if (place < keys.times.size() && keys.times[place] == ticks) {
         keys.values[place] = value;
         keys.attributeOfKey[place] = attribute;
@@ -97,16 +102,15 @@ int FbxAnimCurve::KeyAdd(FbxTime pTime, int* pLast) {
     const std::int64_t ticks = pTime.Get();
     // Keys mostly come in order: the end is tried first.
     auto place = keys.times.size();
-    if (!keys.times.empty() && keys.times.back() >= ticks) {
-        place = static_cast<std::size_t>(std::lower_bound(keys.times.begin(), keys.times.end(), ticks) -
-                                         keys.times.begin());
-    }
-    if (place == keys.times.size() || keys.times[place] != ticks) {
+    if (keys.times.empty() || keys.times.back() < ticks) {
+        keys.times.push_back(ticks);
+        keys.values.push_back(0.0F);
+        keys.attributeOfKey.push_back(detail::CurveKeys::kDefault);
+    } else if (place = placeOf(keys, ticks); keys.times[place] != ticks) {
         const auto offset = static_cast<std::ptrdiff_t>(place);
         keys.times.insert(keys.times.begin() + offset, ticks);
         keys.values.insert(keys.values.begin() + offset, 0.0F);
-        keys.attributeOfKey.insert(keys.attributeOfKey.begin() + offset, 0U);
-        keys.setAttributes(place, detail::KeyAttributes{});
+        keys.attributeOfKey.insert(keys.attributeOfKey.begin() + offset, detail::CurveKeys::kDefault);
     }
     if (pLast)
         *pLast = static_cast<int>(place);

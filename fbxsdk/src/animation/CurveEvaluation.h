@@ -76,6 +76,8 @@ struct Extrapolation {
 /// `attributes`; where that is missing or out of range, default attributes count.
 struct CurveKeys {
     static inline const KeyAttributes kDefaultAttributes;
+    /// The index of the default attributes, which need no place in the list.
+    static constexpr std::uint32_t kDefault = 0xFFFFFFFF;
 
     std::vector<std::int64_t> times; ///< ticks, ascending; of several keys at one time the last counts
     std::vector<float> values;

@@ -44,15 +44,15 @@ std::span<const int> spanOf(const FbxLayerElementArrayTemplate<int>& array) {
     return {array.GetLocked(), static_cast<std::size_t>(array.GetCount())};
 }
 
-/// The first `components` numbers of each item, packed.
+/// The numbers of each item from the first of these components up to before the last one, packed.
 template <class Item>
-std::vector<double> packed(DirectArray<Item> array, int components) {
-    std::vector<double> numbers;
-    numbers.reserve(static_cast<std::size_t>(array.GetCount()) * static_cast<std::size_t>(components));
+std::vector<double> packed(DirectArray<Item> array, int begin, int end) {
+    std::vector<double> numbers(static_cast<std::size_t>(array.GetCount()) * static_cast<std::size_t>(end - begin));
     const Item* const items = array.GetLocked();
+    auto number = numbers.begin();
     for (int i = 0; i < array.GetCount(); ++i) {
-        for (int component = 0; component < components; ++component)
-            numbers.push_back(items[i][component]);
+        for (int component = begin; component < end; ++component)
+            *number++ = items[i][component];
     }
     return numbers;
 }
@@ -68,15 +68,10 @@ template <class Class>
 void writeVectors(const ElementRecords& records, std::string_view name, std::string_view fourthName,
                   std::string_view indexName) {
     DirectArray<FbxVector4> direct = directOf<Class>(records.element);
-    writeArray<double>(records.sink, name, packed<FbxVector4>(direct, 3));
+    writeArray<double>(records.sink, name, packed<FbxVector4>(direct, 0, 3));
     constexpr int kFirstVersionWithFourth = 102;
-    if (records.traits.normalVersion >= kFirstVersionWithFourth) {
-        std::vector<double> fourth;
-        fourth.reserve(static_cast<std::size_t>(direct.GetCount()));
-        for (int i = 0; i < direct.GetCount(); ++i)
-            fourth.push_back(direct.GetAt(i)[3]);
-        writeArray<double>(records.sink, fourthName, fourth);
-    }
+    if (records.traits.normalVersion >= kFirstVersionWithFourth)
+        writeArray<double>(records.sink, fourthName, packed<FbxVector4>(direct, 3, 4));
     writeIndices<Class>(records, indexName);
 }
 
@@ -102,7 +97,7 @@ void writeColors(const ElementRecords& records) {
 }
 
 void writeUVs(const ElementRecords& records) {
-    writeArray<double>(records.sink, "UV", packed<FbxVector2>(directOf<FbxLayerElementUV>(records.element), 2));
+    writeArray<double>(records.sink, "UV", packed<FbxVector2>(directOf<FbxLayerElementUV>(records.element), 0, 2));
     writeIndices<FbxLayerElementUV>(records, "UVIndex");
 }
 

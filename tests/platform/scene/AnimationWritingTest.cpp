@@ -332,6 +332,20 @@ TEST_P(AnimationWriting, KeepsKeysAtAnyTime) {
         EXPECT_EQ(back->KeyGetTime(i).Get(), times[i]);
 }
 
+TEST_P(AnimationWriting, KeepsKeysThatWereAddedAndGivenAValueOnly) {
+    FbxNode* node = addNode("node");
+    FbxAnimCurve* curve = keys(node->LclTranslation, layer, "X", {{0, 0}, {2, 1}});
+    for (const double added : {-1.0, 0.5, 1.0, 3.0}) {
+        const int key = curve->KeyAdd(seconds(added));
+        curve->KeySetValue(key, static_cast<float>(added * added));
+        ASSERT_EQ(curve->KeyGetInterpolation(key), FbxAnimCurveDef::eInterpolationCubic);
+    }
+
+    FbxScene* copy = writeAndRead();
+
+    expectSameCurve(curve, nodeOf(copy)->LclTranslation.GetCurve(layerOf(copy), "X"));
+}
+
 TEST_P(AnimationWriting, WritesTenThousandKeys) {
     FbxNode* node = addNode("node");
     FbxAnimCurve* curve = node->LclTranslation.GetCurve(layer, "X", /*pCreate=*/true);
