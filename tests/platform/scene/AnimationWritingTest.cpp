@@ -127,6 +127,50 @@ TEST_P(AnimationWriting, KeepsTheShapeOfClampedAndBiasedTangents) {
     }
 }
 
+/// Keys with a kind of attributes each, picked by the seed so that all kinds come to stand next to each other.
+void addMixedKeys(FbxAnimCurve* curve, std::uint32_t seed) {
+    namespace KeyFlag = detail::KeyFlag;
+    // Weights that files hold exactly: they count them in steps of 1/9999.
+    constexpr float kThird = 3333 / 9999.0F;
+    const detail::KeyAttributes kKinds[] = {
+        {.flags = KeyFlag::linear},
+        {.flags = KeyFlag::linear | KeyFlag::tangentAuto},
+        {.flags = KeyFlag::constant},
+        {.flags = KeyFlag::cubic | KeyFlag::tangentAuto},
+        {.flags = KeyFlag::cubic | KeyFlag::tangentAuto | KeyFlag::genericClampProgressive},
+        {.flags = KeyFlag::cubic | KeyFlag::tangentUser, .data = {1.5F, -2.0F, kThird, kThird, 0.0F, 0.0F}},
+        {.flags = KeyFlag::cubic | KeyFlag::tangentUser | KeyFlag::genericBreak | KeyFlag::weightedRight |
+                  KeyFlag::weightedNextLeft,
+         .data = {-3.0F, 0.5F, 6000 / 9999.0F, 2000 / 9999.0F, 0.0F, 0.0F}},
+        {.flags = KeyFlag::cubic | KeyFlag::tangentTcb, .data = {0.25F, -0.5F, 0.5F, kThird, 0.0F, 0.0F}}};
+    for (int i = 0; i < 40; ++i) {
+        seed = seed * 1664525U + 1013904223U;
+        const int key = curve->KeyAdd(seconds(0.2 * i));
+        curve->KeySetValue(key, static_cast<float>(seed >> 24) / 64.0F);
+        curve->editKeys().setAttributes(static_cast<std::size_t>(key), kKinds[(seed >> 16) % std::size(kKinds)]);
+    }
+}
+
+TEST_P(AnimationWriting, KeepsTheShapeBetweenKeysOfDifferentKinds) {
+    FbxNode* node = addNode("node");
+    FbxProperty properties[] = {node->LclTranslation, node->LclRotation, node->LclScaling};
+    std::uint32_t seed = 0;
+    for (FbxProperty& property : properties) {
+        for (const char* component : {"X", "Y", "Z"})
+            addMixedKeys(property.GetCurve(layer, component, /*pCreate=*/true), ++seed);
+    }
+
+    FbxScene* copy = writeAndRead();
+
+    FbxProperty copies[] = {nodeOf(copy)->LclTranslation, nodeOf(copy)->LclRotation, nodeOf(copy)->LclScaling};
+    for (std::size_t i = 0; i < std::size(properties); ++i) {
+        for (const char* component : {"X", "Y", "Z"}) {
+            SCOPED_TRACE(properties[i].GetNameAsCStr() + std::string(component));
+            expectSameCurve(properties[i].GetCurve(layer, component), copies[i].GetCurve(layerOf(copy), component));
+        }
+    }
+}
+
 TEST_P(AnimationWriting, KeepsExtrapolation) {
     FbxNode* node = addNode("node");
     FbxAnimCurve* curve = keys(node->LclTranslation, layer, "X", {{0, 1}, {1, 3}});
