@@ -148,10 +148,10 @@ public:
 
     static constexpr std::int64_t kMaxSamplesPerChannel = std::int64_t{1} << 24;
     static constexpr std::int64_t kMaxSamplesPerList = std::int64_t{1} << 29;
-    // A list read from a file holds at most this many samples, and so many more for every byte of the file: a few bytes
-    // that claim an endless animation cost no more memory than a file that has one.
-    static constexpr std::int64_t kSamplesOfAnyFile = std::int64_t{1} << 24;
-    static constexpr std::int64_t kSamplesPerFileByte = 128;
+    // A list read from a file holds at most this many samples (48 MiB), and so many more for every byte of the file: a
+    // few bytes that claim an endless animation cost no more memory than a file that has one.
+    static constexpr std::int64_t kSamplesOfAnyFile = std::int64_t{12} << 20;
+    static constexpr std::int64_t kSamplesPerFileByte = 192;
 
     bool getMeshes(TnFbxReadInfo& info, TnFbxMesh* meshes, int count);
     bool getCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count); ///< The producer cameras first.
@@ -379,8 +379,8 @@ private:
     fbxsdk::FbxManager* mManager = nullptr; // owned
     fbxsdk::FbxScene* mScene = nullptr;     // the manager's
     fbxsdk::FbxAnimStack* mCurrentAnimStack = nullptr;
-    std::int64_t mSamplesLeft; // of a list's share; without an end outside of lists
-    std::int64_t mSamplesPerList = kMaxSamplesPerList;
+    std::int64_t mSamplesLeft;        // of a list's share; without an end outside of lists
+    std::int64_t mSamplesOfFiles = 0; // that a list may hold; 0: no file was loaded
 };
 
 } // namespace Tarnell::Fbx

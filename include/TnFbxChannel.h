@@ -50,8 +50,10 @@ public:
     /// Replaces all samples: `values[k]` is the sample of frame `time.getStartFrame() + k`. The whole record is kept.
     ///
     /// False, and nothing changes, when the range is inverted, `values` is empty, the rate is zero or below, or there
-    /// are fewer values than frames. Values beyond the range are accepted and never read.
+    /// are fewer values than frames. Values beyond the range are accepted and never read. Copied values
+    /// take the memory that the channel has, values that are moved in bring their own.
     bool setAnimatedValues(TnFbxTime time, const std::vector<float>& values);
+    bool setAnimatedValues(TnFbxTime time, std::vector<float>&& values);
 
     /// The value at a possibly fractional frame; the static value when there are no samples.
     ///

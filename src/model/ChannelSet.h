@@ -12,6 +12,7 @@
 #include <cstddef>
 #include <iterator>
 #include <type_traits>
+#include <utility>
 #include <vector>
 
 namespace Tarnell::Fbx::detail {
@@ -84,9 +85,11 @@ struct ChannelSet {
         return found != nullptr && found->setValue(value);
     }
 
-    static bool setValues(Array& channels, Channel channel, const TnFbxTime& time, const std::vector<float>& values) {
+    /// The values are copied or moved, as they are given.
+    template <class Values>
+    static bool setValues(Array& channels, Channel channel, const TnFbxTime& time, Values&& values) {
         TnFbxChannel* found = find(channels, channel);
-        return found != nullptr && found->setAnimatedValues(time, values);
+        return found != nullptr && found->setAnimatedValues(time, std::forward<Values>(values));
     }
 
     static float value(const Array& channels, Channel channel) {

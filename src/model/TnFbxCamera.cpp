@@ -4,6 +4,8 @@
 // The camera: seventeen channels, two modes, and the look-at conversion over its channels.
 #include "TnFbxCamera.h"
 
+#include <utility>
+
 #include "ChannelSet.h"
 #include "LookAtRotation.h"
 
@@ -81,6 +83,10 @@ bool TnFbxCamera::setValue(EFbxCameraChannelType channel, float value) {
 
 bool TnFbxCamera::setValueAt(EFbxCameraChannelType channel, TnFbxTime time, const std::vector<float>& values) {
     return Channels::setValues(mChannels, channel, time, values);
+}
+
+bool TnFbxCamera::setValueAt(EFbxCameraChannelType channel, TnFbxTime time, std::vector<float>&& values) {
+    return Channels::setValues(mChannels, channel, time, std::move(values));
 }
 
 float TnFbxCamera::getValue(EFbxCameraChannelType channel) const { return Channels::value(mChannels, channel); }

@@ -11,6 +11,7 @@
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
+#include <utility>
 
 namespace Tarnell::Fbx {
 
@@ -27,6 +28,14 @@ float clampToRange(float frame, const TnFbxTime& time) {
         return start;
     }
     return frame > end ? end : frame;
+}
+
+/// Whether the range and so many values make samples.
+bool areSamples(const TnFbxTime& time, std::size_t valueCount) {
+    if (time.getStartFrame() > time.getEndFrame() || valueCount == 0 || time.getFrameRate() <= 0.0f) {
+        return false; // kept: a rate of NaN passes
+    }
+    return detail::frameCount(time.getStartFrame(), time.getEndFrame()) <= static_cast<std::int64_t>(valueCount);
 }
 
 } // namespace
@@ -102,14 +111,20 @@ void TnFbxChannel::coverFrame(int frame) {
 }
 
 bool TnFbxChannel::setAnimatedValues(TnFbxTime time, const std::vector<float>& values) {
-    if (time.getStartFrame() > time.getEndFrame() || values.empty() || time.getFrameRate() <= 0.0f) {
-        return false; // kept: a rate of NaN passes
-    }
-    if (detail::frameCount(time.getStartFrame(), time.getEndFrame()) > static_cast<std::int64_t>(values.size())) {
+    if (!areSamples(time, values.size())) {
         return false;
     }
-
     mValues = values;
+    mTime = time;
+    mAnimated = true;
+    return true;
+}
+
+bool TnFbxChannel::setAnimatedValues(TnFbxTime time, std::vector<float>&& values) {
+    if (!areSamples(time, values.size())) {
+        return false;
+    }
+    mValues = std::move(values);
     mTime = time;
     mAnimated = true;
     return true;

@@ -4,6 +4,8 @@
 // The light: six channels, a type and a decay.
 #include "TnFbxLight.h"
 
+#include <utility>
+
 #include "ChannelSet.h"
 
 namespace Tarnell::Fbx {
@@ -54,6 +56,10 @@ bool TnFbxLight::setValue(EFbxLightChannelType channel, float value) {
 
 bool TnFbxLight::setValueAt(EFbxLightChannelType channel, TnFbxTime time, const std::vector<float>& values) {
     return Channels::setValues(mChannels, channel, time, values);
+}
+
+bool TnFbxLight::setValueAt(EFbxLightChannelType channel, TnFbxTime time, std::vector<float>&& values) {
+    return Channels::setValues(mChannels, channel, time, std::move(values));
 }
 
 float TnFbxLight::getValue(EFbxLightChannelType channel) const { return Channels::value(mChannels, channel); }

@@ -4,6 +4,8 @@
 // The marker: four colour channels, a size and a look.
 #include "TnFbxMarker.h"
 
+#include <utility>
+
 #include "ChannelSet.h"
 
 namespace Tarnell::Fbx {
@@ -52,6 +54,10 @@ bool TnFbxMarker::setValue(EFbxMarkerChannelType channel, float value) {
 
 bool TnFbxMarker::setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, const std::vector<float>& values) {
     return Channels::setValues(mChannels, channel, time, values);
+}
+
+bool TnFbxMarker::setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, std::vector<float>&& values) {
+    return Channels::setValues(mChannels, channel, time, std::move(values));
 }
 
 float TnFbxMarker::getValue(EFbxMarkerChannelType channel) const { return Channels::value(mChannels, channel); }

@@ -4,6 +4,8 @@
 // The transform: fifteen channels and two orders.
 #include "TnFbxTransform.h"
 
+#include <utility>
+
 #include "ChannelSet.h"
 
 namespace Tarnell::Fbx {
@@ -64,6 +66,11 @@ bool TnFbxTransform::setTransformValue(EFbxTransformChannelType channel, float v
 bool TnFbxTransform::setTransformValueAt(EFbxTransformChannelType channel, TnFbxTime time,
                                          const std::vector<float>& values) {
     return Channels::setValues(mChannels, channel, time, values);
+}
+
+bool TnFbxTransform::setTransformValueAt(EFbxTransformChannelType channel, TnFbxTime time,
+                                         std::vector<float>&& values) {
+    return Channels::setValues(mChannels, channel, time, std::move(values));
 }
 
 float TnFbxTransform::getTransformValue(EFbxTransformChannelType channel) const {

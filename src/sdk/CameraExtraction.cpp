@@ -82,7 +82,7 @@ void readFieldOfViewAsFocalLength(PropertySampler& properties, const Camera& sou
     for (float& sample : properties.samples()) {
         sample = toFloat(source.ComputeFocalLength(static_cast<double>(sample)));
     }
-    camera.setValueAt(TnFbxCamera::kFbxCameraFocalLength, properties.time(), properties.samples());
+    camera.setValueAt(TnFbxCamera::kFbxCameraFocalLength, properties.time(), std::move(properties.samples()));
 }
 
 void readLens(PropertySampler& properties, const Camera& source, TnFbxCamera& camera) {
@@ -200,9 +200,9 @@ bool FbxSdk::getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node
                                              unused[1], unused[2], unused[3], unused[4], unused[5])) {
         for (int i = 0; i < 3; ++i) {
             const auto channel = channelAfter(TnFbxCamera::kFbxCameraLookAtPositionX, i);
-            const std::vector<float>& samples = position[static_cast<std::size_t>(i)];
-            camera.setValueAt(channel, time, samples);
+            std::vector<float>& samples = position[static_cast<std::size_t>(i)];
             camera.setValue(channel, samples.front());
+            camera.setValueAt(channel, time, std::move(samples));
         }
     }
     return true;
@@ -232,7 +232,7 @@ void FbxSdk::setLookAtRotation(TnFbxCamera& camera) {
     time.setTime(0.0f, range.start, range.end, range.rate);
     for (int i = 0; i < 3; ++i) {
         camera.setTransformValueAt(channelAfter(TnFbxTransform::kFbxTransformRotationX, i), time,
-                                   angles[static_cast<std::size_t>(i)]);
+                                   std::move(angles[static_cast<std::size_t>(i)]));
     }
 }
 

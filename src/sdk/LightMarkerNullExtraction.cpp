@@ -83,7 +83,7 @@ void readIntensity(PropertySampler& properties, TnFbxLight& light, const Light& 
         for (float& sample : properties.samples()) {
             sample *= TnFbxLight::kNormalizeLightIntensity;
         }
-        light.setValueAt(TnFbxLight::kFbxLightIntensity, properties.time(), properties.samples());
+        light.setValueAt(TnFbxLight::kFbxLightIntensity, properties.time(), std::move(properties.samples()));
     }
 }
 

@@ -111,6 +111,7 @@ void FbxSdk::readVertexCacheData(fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time, f
         const int channel = cache->GetChannelIndex(channelName);
         read = channel >= 0 && cache->Read(channel, time, buffer.data(), pointCount);
     } else {
+        detail::useTimeModeOf(mScene);
         const auto frame = static_cast<unsigned int>(time.GetFrameCount(fbxsdk::FbxTime::eDefaultMode));
         read = cache->Read(frame, buffer.data(), pointCount);
     }

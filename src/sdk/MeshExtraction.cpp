@@ -182,11 +182,16 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
     }
     setControlPoints(time, *node, *source, pointBake, mesh);
     fillLayout(*source, arrays);
+    bool normals = false, uvs = false;
     if (fbxsdk::FbxLayer* first = source->GetLayer(0)) {
-        mesh.setValidNormals(fillNormals(*source, *first, normalBake, arrays));
-        mesh.setValidUVs(fillUVs(*source, *first, arrays));
+        normals = fillNormals(*source, *first, normalBake, arrays);
+        uvs = fillUVs(*source, *first, arrays);
     }
-    mesh.setValidColours(fillColours(*source, arrays));
+    const bool colours = fillColours(*source, arrays);
+    // At the end: of a mesh that a damaged layer left partly filled, nothing is valid.
+    mesh.setValidNormals(normals);
+    mesh.setValidUVs(uvs);
+    mesh.setValidColours(colours);
     return succeed();
 }
 

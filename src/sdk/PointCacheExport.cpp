@@ -6,6 +6,7 @@
 #include "FbxSdk.h"
 
 #include "LastError.h"
+#include "PointCachePlace.h"
 #include "model/FrameArithmetic.h"
 
 #include <cstdint>
@@ -24,24 +25,8 @@ using Cache = fbxsdk::FbxCache;
 using Paths = fbxsdk::FbxPathUtils;
 using Text = fbxsdk::FbxString;
 
-/// Where the cache of one mesh of an FBX file lies.
-struct CachePlace {
-    Text fbxFolder;
-    Text folder;
-    Text file;
-};
-
-CachePlace placeOf(const std::string& fbxFileName, const char* nodeName, const std::string& extension) {
-    CachePlace place;
-    place.fbxFolder = Paths::GetFolderName(Paths::Resolve(fbxFileName.c_str()));
-    const Text stem = Paths::GetFileName(fbxFileName.c_str(), /*pWithExtension*/ false);
-    place.folder = Paths::Clean(place.fbxFolder + "/" + stem + "_fpc");
-    place.file = place.folder + "/" + nodeName + extension.c_str();
-    return place;
-}
-
 /// A node's name may hold separators; it must not lead to files elsewhere.
-bool staysInFolder(const CachePlace& place) {
+bool staysInFolder(const detail::PointCachePlace& place) {
     const Text folder = place.folder + "/";
     return Paths::Clean(place.file).Left(folder.GetLen()) == folder;
 }
@@ -51,6 +36,12 @@ Cache* cacheOf(fbxsdk::FbxNode& node) {
     auto* deformer = fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(
         geometry != nullptr ? geometry->GetDeformer(0, fbxsdk::FbxDeformer::eVertexCache) : nullptr);
     return deformer != nullptr ? deformer->GetCache() : nullptr;
+}
+
+std::string fileNameOf(const Cache& cache) {
+    Text relative, absolute;
+    cache.GetCacheFileName(relative, absolute);
+    return std::string(absolute);
 }
 
 /// Null, or why the points of the mesh are not those of the range.
@@ -119,18 +110,17 @@ bool FbxSdk::mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* 
         return fail("no file name is given");
     }
     const char* name = meshNode->GetName();
-    const CachePlace place =
-        placeOf(fbxFileName, name, mayaFormat ? kMayaVertexCacheFileExtension : kMaxVertexCacheFileExtension);
+    const auto place = detail::pointCachePlace(
+        fbxFileName, name, mayaFormat ? kMayaVertexCacheFileExtension : kMaxVertexCacheFileExtension);
     if (!staysInFolder(place)) {
         return fail(std::string(name) + ": a point cache of that name lies outside of its folder");
     }
-    const Text relative = Paths::GetRelativeFilePath(place.fbxFolder + "/", place.file);
     if (!Paths::Create(place.folder)) {
         return fail(std::string(place.folder) + ": the folder cannot be created");
     }
 
     Cache* cache = Cache::Create(manager, name);
-    cache->SetCacheFileName(relative, place.file);
+    cache->SetCacheFileName(place.relative, place.file);
     cache->SetCacheFileFormat(mayaFormat ? Cache::eMayaCache : Cache::eMaxPointCacheV2);
 
     auto* deformer = fbxsdk::FbxVertexCacheDeformer::Create(manager, name);
@@ -156,7 +146,7 @@ bool FbxSdk::animateVertexCacheOnMesh(fbxsdk::FbxNode* meshNode, const TnFbxMesh
     fbxsdk::FbxStatus status;
     if (!openCache(*cache, meshNode->GetName(), *mesh, mayaFormat, useMcxFormat, time, status)) {
         std::cout << "Error opening file for write: " << status.GetErrorString() << std::endl; // kept: hosts show it
-        return fail(status.GetErrorString());
+        return fail(fileNameOf(*cache) + ": " + status.GetErrorString());
     }
     writeSamples(*cache, meshNode->GetName(), *mesh, mayaFormat, time); // kept: only closing says whether it worked
     return cache->CloseFile(&status) ? succeed() : fail(status.GetErrorString());

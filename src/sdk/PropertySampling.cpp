@@ -6,9 +6,26 @@
 
 #include "FbxSdk.h"
 
+#include <algorithm>
+#include <utility>
+
 namespace Tarnell::Fbx {
 
 using detail::PropertySampler;
+
+namespace {
+
+/// Later ones are worked out for each channel: there may be more frames than memory.
+constexpr std::int64_t kMostKeptMoments = std::int64_t{1} << 16;
+
+} // namespace
+
+void detail::useTimeModeOf(const fbxsdk::FbxScene* scene) {
+    if (scene != nullptr) {
+        const fbxsdk::FbxGlobalSettings& settings = scene->GetGlobalSettings();
+        fbxsdk::FbxTime::SetGlobalTimeMode(settings.GetTimeMode(), settings.GetCustomFrameRate());
+    }
+}
 
 std::vector<fbxsdk::FbxAnimLayer*> detail::layersOf(fbxsdk::FbxAnimStack* stack) {
     std::vector<fbxsdk::FbxAnimLayer*> layers;
@@ -62,15 +79,22 @@ detail::SampleRange PropertySampler::keyedRange() const {
 }
 
 // kept: seconds are counted at the scene's rate also when the frames were converted to another one
+fbxsdk::FbxTime PropertySampler::momentOf(std::int64_t frame) const {
+    fbxsdk::FbxTime moment;
+    moment.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(mRate));
+    return moment;
+}
+
 void PropertySampler::setMoments(std::int64_t first, std::int64_t count) {
+    count = std::min(count, kMostKeptMoments);
     if (mFirstFrame == first && static_cast<std::int64_t>(mMoments.size()) == count) {
         return;
     }
     mMoments.clear();
-    mMoments.resize(static_cast<std::size_t>(count));
+    mMoments.reserve(static_cast<std::size_t>(count));
     mFirstFrame = first;
-    for (fbxsdk::FbxTime& moment : mMoments) {
-        moment.SetSecondDouble(static_cast<double>(first++) / static_cast<double>(mRate));
+    for (std::int64_t i = 0; i < count; ++i) {
+        mMoments.push_back(momentOf(first + i));
     }
 }
 
@@ -92,8 +116,7 @@ bool PropertySampler::sample(const fbxsdk::FbxProperty& property, const char* co
     }
 
     const std::int64_t count = frameCount(range.first, range.last);
-    const bool keyed = count > 0;
-    if (keyed) {
+    if (count > 0) {
         if (!takeSamples(mSamplesLeft, count, /*channelCount*/ 1)) {
             return false;
         }
@@ -102,8 +125,11 @@ bool PropertySampler::sample(const fbxsdk::FbxProperty& property, const char* co
         for (const fbxsdk::FbxTime& moment : mMoments) {
             mSamples.push_back(valueAt(moment));
         }
+        for (auto i = static_cast<std::int64_t>(mMoments.size()); i < count; ++i) {
+            mSamples.push_back(valueAt(momentOf(range.first + i)));
+        }
     }
-    mTime.setTime(0.0f, range.first, range.last, keyed ? mRate : 0.0f);
+    mTime = sampledTime(range, mRate);
     return true;
 }
 
@@ -115,12 +141,13 @@ void PropertySampler::readIntoTransform(TnFbxTransform& transform,
         const auto channel = channelAfter(firstChannel, i);
         transform.setTransformValue(channel, toFloat(value[i]));
         if (sample(property, kComponents[i])) {
-            transform.setTransformValueAt(channel, mTime, mSamples);
+            transform.setTransformValueAt(channel, mTime, std::move(mSamples));
         }
     }
 }
 
 detail::PropertySampler FbxSdk::sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS) {
+    detail::useTimeModeOf(mScene);
     return PropertySampler(mScene, mCurrentAnimStack, time, useSampleFPS, sampleFPS, mSamplesLeft);
 }
 

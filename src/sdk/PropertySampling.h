@@ -31,6 +31,10 @@ constexpr Channel channelAfter(Channel channel, int offset) {
 /// The number that an enumeration property holds, which in a file can be any.
 inline int enumNumber(const fbxsdk::FbxProperty& property) { return property.Get<fbxsdk::FbxEnum>(); }
 
+/// Makes the scene's rate the one that this thread counts frames at; the scene that was loaded last left its own there.
+/// No scene: nothing changes.
+void useTimeModeOf(const fbxsdk::FbxScene* scene);
+
 /// The layers of an animation stack, in order; none of a null stack.
 std::vector<fbxsdk::FbxAnimLayer*> layersOf(fbxsdk::FbxAnimStack* stack);
 
@@ -59,7 +63,7 @@ public:
     void sampleInto(Object& object, Channel channel, const fbxsdk::FbxProperty& property,
                     const char* component = nullptr) {
         if (sample(property, component)) {
-            object.setValueAt(channel, mTime, mSamples);
+            object.setValueAt(channel, mTime, std::move(mSamples));
         }
     }
 
@@ -86,6 +90,7 @@ private:
     void collectCurves(const fbxsdk::FbxProperty& property, const char* component);
     SampleRange keyedRange() const;
     void setMoments(std::int64_t first, std::int64_t count);
+    fbxsdk::FbxTime momentOf(std::int64_t frame) const;
     float valueAt(const fbxsdk::FbxTime& moment);
 
     std::vector<fbxsdk::FbxAnimLayer*> mLayers;
@@ -103,7 +108,7 @@ private:
     };
 
     std::vector<SampledCurve> mCurves;     // of the component being sampled, with and without keys
-    std::vector<fbxsdk::FbxTime> mMoments; // one per frame; all curves of a read mostly have the same
+    std::vector<fbxsdk::FbxTime> mMoments; // of the first frames; all curves of a read mostly have the same
     std::int64_t mFirstFrame = 0;          // of the moments
     TnFbxTime mTime;
     std::vector<float> mSamples;

@@ -47,6 +47,13 @@ struct SampleRange {
     constexpr bool isAnimation() const { return wrappingSubtract(last, first) > 0; }
 };
 
+/// What is said about the samples of a range: their frames and their rate, which for no samples is 0.
+inline TnFbxTime sampledTime(const SampleRange& range, float rate) {
+    TnFbxTime time;
+    time.setTime(0.0f, range.first, range.last, frameCount(range.first, range.last) > 0 ? rate : 0.0f);
+    return time;
+}
+
 /// Takes the samples of some channels over so many frames out of what is left. False, with nothing taken, when that
 /// goes over one of the limits.
 constexpr bool takeSamples(std::int64_t& samplesLeft, std::int64_t frameCount, std::int64_t channelCount) {

@@ -312,7 +312,7 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     if (!mInitialized || mScene == nullptr) {
         return fail("no scene is loaded");
     }
-    const SampleShare share(mSamplesLeft, mSamplesPerList);
+    const SampleShare share(mSamplesLeft, mSamplesOfFiles > 0 ? mSamplesOfFiles : kMaxSamplesPerList);
     TnFbxTime time;
     getGlobalAnimationStackTime(time, info.getFrame(), info.getUseSampleFPS(), info.getSampleFPS());
     int index = 0;

@@ -7,6 +7,7 @@
 
 #include "LastError.h"
 #include "NodeWalk.h"
+#include "PropertySampling.h"
 #include "SampleRange.h"
 #include "model/FrameArithmetic.h"
 
@@ -129,6 +130,7 @@ bool FbxSdk::destroyFbxSdkManager() {
     }
     destroySdkObjects(&mManager);
     mScene = nullptr; // both died with the manager
+    mSamplesOfFiles = 0;
     mCurrentAnimStack = nullptr;
     mInitialized = false;
     return true; // the reason of a failure that led here stays
@@ -192,7 +194,7 @@ bool FbxSdk::loadScene(const std::string& fileName, bool convertGeometry) {
         convertNurbsAndPatchRecursive(mManager, mScene->GetRootNode());
     }
     initCreateAnimationStack();
-    mSamplesPerList = samplesForFile(fileName);
+    mSamplesOfFiles = std::min(mSamplesOfFiles + samplesForFile(fileName), kMaxSamplesPerList);
     return succeed();
 }
 
@@ -252,6 +254,7 @@ bool FbxSdk::getGlobalAnimationStackTime(TnFbxTime& time, float frame, bool useS
     if (!mInitialized || mScene == nullptr || mCurrentAnimStack == nullptr) {
         return fail("no scene is loaded");
     }
+    detail::useTimeModeOf(mScene);
     const fbxsdk::FbxTimeSpan span = mCurrentAnimStack->GetLocalTimeSpan();
     const fbxsdk::FbxTime::EMode mode = mScene->GetGlobalSettings().GetTimeMode();
     float rate = static_cast<float>(fbxsdk::FbxTime::GetFrameRate(mode));

@@ -130,9 +130,9 @@ bool FbxSdk::getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float
                                              values[4], values[5], values[6], values[7], values[8])) {
         for (int i = 0; i < 9; ++i) {
             const auto channel = detail::channelAfter(TnFbxTransform::kFbxTransformPositionX, i);
-            const std::vector<float>& samples = values[static_cast<std::size_t>(i)];
-            transform.setTransformValueAt(channel, time, samples);
+            std::vector<float>& samples = values[static_cast<std::size_t>(i)];
             transform.setTransformValue(channel, samples.front());
+            transform.setTransformValueAt(channel, time, std::move(samples));
         }
     }
     return succeed(); // an empty range leaves the channels at their defaults

@@ -7,10 +7,12 @@
 
 #include "Fbx.h"
 #include "TnFbxError.h"
+#include "sdk/PointCachePlace.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <array>
 #include <filesystem>
 #include <iostream>
 #include <limits>
@@ -23,7 +25,9 @@ using support::TemporaryFolder;
 using test::movingMesh;
 using test::WrittenObjects;
 using test::WrittenScene;
+using testing::Each;
 using testing::ElementsAre;
+using testing::EndsWith;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::StartsWith;
@@ -54,20 +58,27 @@ struct CacheScene : WrittenScene {
     }
     FbxCache& cache() const { return *deformer()->GetCache(); }
 
-    /// The Z of the second point, which numbers the sets, at a frame of the open cache.
-    double setAt(int frame) const {
-        double buffer[9] = {};
+    /// The three points at a frame of the open cache.
+    std::array<double, 9> pointsAt(int frame) const {
+        std::array<double, 9> buffer;
+        buffer.fill(-1.0);
         if (maya) {
             fbxsdk::FbxTime time;
             time.SetSecondDouble(frame / 24.0);
-            EXPECT_TRUE(cache().Read(0, time, buffer, 3u));
+            EXPECT_TRUE(cache().Read(0, time, buffer.data(), 3u));
         } else {
-            EXPECT_TRUE(cache().Read(static_cast<unsigned int>(frame), buffer, 3u));
+            EXPECT_TRUE(cache().Read(static_cast<unsigned int>(frame), buffer.data(), 3u));
         }
-        EXPECT_EQ(buffer[3], 1.0);
-        EXPECT_EQ(buffer[6], 2.0);
-        EXPECT_EQ(buffer[7], 4.0);
-        return buffer[5];
+        return buffer;
+    }
+
+    /// The Z of the second point, which numbers the sets, at a frame of the open cache.
+    double setAt(int frame) const {
+        const std::array<double, 9> points = pointsAt(frame);
+        EXPECT_EQ(points[3], 1.0);
+        EXPECT_EQ(points[6], 2.0);
+        EXPECT_EQ(points[7], 4.0);
+        return points[5];
     }
 
     TemporaryFolder folder;
@@ -113,6 +124,14 @@ TEST(PointCacheMapping, NamesTheFileAfterTheNodeInAFolderNamedAfterTheFbxFile) {
         EXPECT_TRUE(fs::is_directory(scene.folder.file("out/shot_fpc")));
         EXPECT_THAT(filesIn(scene.folder.file("out/shot_fpc")), IsEmpty());
     }
+}
+
+TEST(PointCacheMapping, LiesBesideAnFbxFileInTheRootFolder) {
+    const auto place = detail::pointCachePlace("/shot.fbx", "ball", ".xml");
+
+    EXPECT_STREQ(place.folder, "/shot_fpc");
+    EXPECT_STREQ(place.file, "/shot_fpc/ball.xml");
+    EXPECT_STREQ(place.relative, "shot_fpc/ball.xml");
 }
 
 TEST(PointCacheMapping, AttachesAnActiveDeformerNamedAfterTheNode) {
@@ -225,6 +244,7 @@ TEST_P(PointCacheSamples, AreZeroWhereASetHasNoPoints) {
     EXPECT_TRUE(scene.animate(framesFrom(0, 1))) << lastError();
 
     ASSERT_TRUE(scene.cache().OpenFileForRead());
+    EXPECT_THAT(scene.pointsAt(1), Each(0.0));
     EXPECT_TRUE(scene.cache().CloseFile());
 }
 
@@ -237,8 +257,9 @@ TEST_P(PointCacheSamples, SayOnStandardOutputThatTheFileCannotBeOpened) {
     const std::string printed = printedBy([&] { result = scene.animate(framesFrom(10, 12)); });
 
     EXPECT_FALSE(result);
-    EXPECT_EQ(printed, "Error opening file for write: " + lastError() + "\n");
-    EXPECT_FALSE(lastError().empty());
+    EXPECT_EQ(printed, "Error opening file for write: cannot be written: No such file or directory\n");
+    EXPECT_THAT(lastError(), StartsWith(scene.folder.file("out/shot_fpc/ball.")));
+    EXPECT_THAT(lastError(), EndsWith(": cannot be written: No such file or directory"));
 }
 
 TEST_P(PointCacheSamples, ReplaceThoseOfAnEarlierWrite) {

@@ -54,7 +54,8 @@ public:
     int GetChannelCount(FbxStatus* pStatus = nullptr);
     bool GetChannelName(int pChannelIndex, FbxString& pChannelName, FbxStatus* pStatus = nullptr);
 
-    // Maya caches. Buffers hold three numbers per point.
+    // Maya caches. Buffers hold three numbers per point. Why a file cannot be opened for writing is said without its
+    // name, everything else with it.
     bool OpenFileForWrite(EMCFileCount pFileCount, double pSamplingFrameRate, const char* pChannelName,
                           EMCBinaryFormat pBinaryFormat, EMCDataType pMCDataType = eDoubleVectorArray,
                           const char* pInterpretation = "Points", FbxStatus* pStatus = nullptr);

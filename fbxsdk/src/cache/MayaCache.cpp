@@ -183,12 +183,15 @@ std::unique_ptr<MayaCacheWriter> MayaCacheWriter::open(const std::string& descri
                                                        FileOperations& operations) {
     auto writer = std::make_unique<MayaCacheWriter>(descriptionFile, description, operations);
     if (writer->mDataFile == descriptionFile) {
-        status.SetCode(FbxStatus::eInvalidParameter, "%s: a cache description cannot have the name of its data",
-                       descriptionFile.c_str());
+        status.SetCode(FbxStatus::eInvalidParameter, "a cache description cannot have the name of its data");
         return nullptr;
     }
-    if (!writer->mData.open(status) || !writer->mText.open(status))
-        return nullptr;
+    for (OutputFile* const file : {&writer->mData, &writer->mText}) {
+        if (!file->open(status)) {
+            status.SetCode(FbxStatus::eFailure, "%s", file->reason().c_str());
+            return nullptr;
+        }
+    }
     // Like other writers of one-file caches: the true range stands in the description.
     writer->mData.write(mayaCacheHeader(description.wide, 0, 1));
     return writer;

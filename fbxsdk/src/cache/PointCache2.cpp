@@ -107,12 +107,14 @@ PointCacheWriter::PointCacheWriter(const std::string& fileName, const PointCache
 std::unique_ptr<PointCacheWriter> PointCacheWriter::open(const std::string& fileName, const PointCacheHeader& header,
                                                          FbxStatus& status, FileOperations& operations) {
     if (const char* fault = headerFault(header)) {
-        status.SetCode(FbxStatus::eInvalidParameter, "%s: cannot be written: %s", fileName.c_str(), fault);
+        status.SetCode(FbxStatus::eInvalidParameter, "cannot be written: %s", fault);
         return nullptr;
     }
     auto writer = std::make_unique<PointCacheWriter>(fileName, header, operations);
-    if (!writer->mFile.open(status))
+    if (!writer->mFile.open(status)) {
+        status.SetCode(FbxStatus::eFailure, "%s", writer->mFile.reason().c_str());
         return nullptr;
+    }
     char bytes[kHeaderBytes] = {};
     std::memcpy(bytes, kMagic, sizeof kMagic);
     storeNumber(bytes + 12, std::int32_t{1});

@@ -77,9 +77,10 @@ void OutputFile::note(int error) {
 }
 
 void OutputFile::report(FbxStatus& status) const {
-    status.SetCode(FbxStatus::eFailure, "%s: cannot be written: %s", mName.c_str(),
-                   std::generic_category().message(mError).c_str());
+    status.SetCode(FbxStatus::eFailure, "%s: %s", mName.c_str(), reason().c_str());
 }
+
+std::string OutputFile::reason() const { return "cannot be written: " + std::generic_category().message(mError); }
 
 bool OutputFile::fail(int error, FbxStatus& status) {
     note(error);

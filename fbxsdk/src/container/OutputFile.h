@@ -35,8 +35,10 @@ public:
     void extend(std::uint64_t size);
     [[nodiscard]] std::uint64_t size() const override { return mWritten + mBuffer.size(); }
     [[nodiscard]] bool failed() const override { return mError != 0; }
-    /// Says in the status why it failed.
+    /// Says in the status which file failed, and why.
     void report(FbxStatus& status) const;
+    /// Why it failed, without its name.
+    [[nodiscard]] std::string reason() const;
 
     /// Completes the file. False when that or any write before it failed; the status says why.
     [[nodiscard]] bool commit(FbxStatus& status);

@@ -34,6 +34,8 @@ using support::AsNobody;
 using support::FailingOperations;
 using testing::AnyOf;
 using testing::HasSubstr;
+using testing::Not;
+using testing::StartsWith;
 
 namespace {
 
@@ -100,11 +102,14 @@ protected:
         return all;
     }
     /// Both names are those of the same cache.
+    /// What fails later names the file; who opens a cache knows it.
     void expectReason(const std::string& reason) const {
+        const std::string message = status.GetErrorString();
         EXPECT_TRUE(status.Error());
-        EXPECT_THAT(status.GetErrorString(), HasSubstr(reason));
-        EXPECT_THAT(status.GetErrorString(), AnyOf(HasSubstr(folder.file(subfolder + dataName())),
-                                                   HasSubstr(folder.file(subfolder + mainName()))));
+        EXPECT_THAT(message, HasSubstr(reason));
+        EXPECT_THAT(message,
+                    AnyOf(StartsWith(folder.file(subfolder + dataName()) + ": "),
+                          StartsWith(folder.file(subfolder + mainName()) + ": "), Not(HasSubstr(folder.file("")))));
     }
 
     support::TemporaryFolder folder;
@@ -508,7 +513,7 @@ TEST(MayaCacheFiles, CannotHaveTheSameName) {
     FbxStatus status;
 
     EXPECT_FALSE(detail::MayaCacheWriter::open(folder.file("ball.mc"), description, status));
-    EXPECT_THAT(status.GetErrorString(), HasSubstr("ball.mc"));
+    EXPECT_STREQ(status.GetErrorString(), "a cache description cannot have the name of its data");
     description.wide = true;
     EXPECT_TRUE(detail::MayaCacheWriter::open(folder.file("ball.mc"), description, status));
     EXPECT_TRUE(folder.files().empty());
