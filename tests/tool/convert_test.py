@@ -9,7 +9,7 @@ import sys
 import tempfile
 import unittest
 
-from support import ROOT, SHOT, dump, named, run
+from support import NO_FRAMES, ROOT, SHOT, dump, edited, named, run
 
 MOVING = os.path.join(ROOT, "tests", "data", "tool", "moving_triangle.fbx")
 SKINNED = os.path.join(ROOT, "tests", "data", "blender", "skin_7400_binary.fbx")
@@ -217,6 +217,33 @@ class Convert(unittest.TestCase):
         self.assertEqual(self.convert("--force", "--frames", "1001:1011", source=MOVING).stderr, "")
         self.assertIn("look-at points, up vectors and rolls of cameras: 1\n", self.convert("--force").stderr)
 
+    def source(self, fixture, *replacements):
+        return edited(fixture, os.path.join(self.folder.name, "source.fbx"), *replacements)
+
+    def test_a_camera_with_the_name_of_a_view_is_written_like_any_other(self):
+        for name in ("Producer Left", "Producer Cam"):
+            source = self.source("camera_7400_ascii.fbx", ("Model::shot", "Model::" + name))
+            self.convert("--force", source=source)
+            cameras = [camera["name"] for camera in dump("--kind", "cameras", self.out)["cameras"]]
+            self.assertEqual(len(cameras), 8)
+            self.assertEqual(cameras[7], name)
+
+    def test_of_a_mesh_without_polygons_the_transform_is_written_and_the_rest_said(self):
+        source = self.source("mesh_7400_ascii.fbx", ("*7 {\n\t\t\ta: 0,1,2,-4,3,2,-5", "*0 {\n\t\t\ta: "))
+        self.assertIn("not written: meshes without polygons: 1\n", self.convert(source=source).stderr)
+        page = dump(self.out)
+        self.assertEqual(page["meshes"], [])
+        self.assertIn("shape", [transform["name"] for transform in page["transforms"]])
+
+    def test_what_becomes_of_markers_is_said(self):
+        source = self.source("markers_7400_ascii.fbx")
+        count = len(dump("--kind", "markers", source)["markers"])
+        self.assertGreater(count, 0)
+        self.assertIn(f"written as nulls, without look, size and colour: markers: {count}\n",
+                      self.convert("--force", source=source).stderr)
+        self.assertIn(f"not written: markers: {count}\n",
+                      self.convert("--force", "--kind", "nulls", source=source).stderr)
+
     def test_a_copy_of_a_copy_is_the_same(self):
         self.convert()
         first = self.out
@@ -267,7 +294,9 @@ class Convert(unittest.TestCase):
 
     def test_wrong_usage_gives_status_2(self):
         for arguments in (["--version", "2015"], ["--ascii", "--binary"], ["--kind", "markers"], ["--frames", "9:1"],
-                          ["--fps", "0"], ["--cache", "alembic"], ["--fps", "-24"]):
+                          ["--fps", "0"], ["--cache", "alembic"], ["--fps", "-24"], ["--fps", "nan"], ["--fps", "inf"],
+                          ["--fps", "1e39"], ["--fps", ""], ["--fps", "24x"], ["--kind", ""], ["--kind", "nulls,"],
+                          ["--version", ""], ["--cache", ""], *(["--frames", frames] for frames in NO_FRAMES)):
             result = run("convert", *arguments, SHOT, self.out)
             self.assertEqual(result.returncode, 2, arguments)
         self.assertFalse(os.path.exists(self.out))

@@ -7,7 +7,7 @@ import sys
 import tempfile
 import unittest
 
-from support import SHOT, dump, named, run
+from support import NO_FRAMES, SHOT, dump, float32, named, run
 
 CAMERA_CHANNELS = [
     "lookAtPositionX", "lookAtPositionY", "lookAtPositionZ", "upPositionX", "upPositionY", "upPositionZ", "roll",
@@ -101,11 +101,37 @@ class Dump(unittest.TestCase):
                 self.assertTrue(result.stderr.startswith(f"tarnell-fbx: {file}: "), result.stderr)
 
     def test_wrong_usage_gives_status_2(self):
-        for arguments in ((), ("dump",), ("dump", "--kind", "teapots", SHOT), ("dump", "--frames", "3:1", SHOT),
-                          ("dump", "--frames", "x", SHOT), ("dump", "--no-such-option", SHOT), ("info",), ("bake",)):
+        for arguments in ((), ("dump",), ("dump", "--kind", "teapots", SHOT), ("dump", "--no-such-option", SHOT),
+                          ("info",), ("bake",)):
             result = run(*arguments)
             self.assertEqual(result.returncode, 2, arguments)
             self.assertEqual(result.stdout, "")
+
+    def test_what_is_no_kind_is_wrong_usage(self):
+        for kinds in ("", ",", "nulls,", ",nulls", "nulls,,lights", "Nulls", " nulls"):
+            result = run("dump", "--kind", kinds, SHOT)
+            self.assertEqual((result.returncode, result.stdout), (2, ""), kinds)
+            self.assertIn("--kind", result.stderr)
+
+    def test_what_is_no_range_of_frames_is_wrong_usage(self):
+        for frames in NO_FRAMES:
+            result = run("dump", "--frames", frames, SHOT)
+            self.assertEqual((result.returncode, result.stdout), (2, ""), frames)
+            self.assertIn("--frames", result.stderr)
+        self.assertEqual(run("dump", "--frames", "1001:1002", "--frames", "1003:1004", SHOT).returncode, 2)
+
+    def test_what_is_no_number_is_wrong_usage(self):
+        for option in ("--frame", "--sample-fps"):
+            for number in ("", "x", "24x", "2 4", "nan", "inf", "1e39"):
+                result = run("dump", option, number, SHOT)
+                self.assertEqual((result.returncode, result.stdout), (2, ""), (option, number))
+                self.assertIn(option, result.stderr)
+
+    def test_frames_reach_from_the_lowest_int_to_the_highest(self):
+        for frame in (-2147483648, -1, 0, 2147483647):
+            for frames in (str(frame), f"{frame}:{frame}"):
+                meshes = dump("--kind", "meshes", f"--frames={frames}", SHOT)["meshes"]
+                self.assertEqual([mesh["frame"] for mesh in meshes], [float32(frame)])
 
     def test_help_is_no_error(self):
         self.assertEqual(run("--help").returncode, 0)

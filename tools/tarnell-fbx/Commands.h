@@ -4,6 +4,7 @@
 // The commands of the tool. Each returns the process's exit status.
 #pragma once
 
+#include <functional>
 #include <optional>
 #include <string>
 #include <utility>
@@ -50,5 +51,9 @@ int info(const std::vector<std::string>& files);
 
 /// One line on standard error, as every failure of the tool prints it.
 void printError(const std::string& file, const std::string& reason);
+
+/// Runs work on a file, and hands out its exit status. What the work throws is a failure like any other: the reason is
+/// printed, and the status is kUnreadable.
+int guarded(const std::string& file, const std::function<int()>& work);
 
 } // namespace tool

@@ -190,15 +190,23 @@ private:
     bool readCameras() {
         if (!collect(mCameras, &FbxSdk::getNumberOfCameras, 32, &FbxSdk::getCameras))
             return false;
-        const auto isView = [](const TnFbxCamera* camera) { return camera->getName().rfind("Producer ", 0) == 0; };
         auto& chosen = mCameras.chosen;
-        chosen.erase(std::remove_if(chosen.begin(), chosen.end(), isView), chosen.end());
+        chosen.erase(chosen.begin(), chosen.begin() + leadingViews(chosen));
         if (!mOptions.local)
             placeCameras();
         const auto interested =
             std::count_if(chosen.begin(), chosen.end(), [](const TnFbxCamera* camera) { return hasInterest(*camera); });
         lose(static_cast<int>(interested), "not written: look-at points, up vectors and rolls of cameras");
         return true;
+    }
+
+    /// The views of the application come first, each once. A camera of the scene may have the name of one.
+    static std::ptrdiff_t leadingViews(const std::vector<TnFbxCamera*>& cameras) {
+        std::set<std::string> views = {"Producer Perspective", "Producer Top",   "Producer Bottom", "Producer Front",
+                                       "Producer Back",        "Producer Right", "Producer Left"};
+        const auto first = std::find_if(cameras.begin(), cameras.end(),
+                                        [&](const TnFbxCamera* camera) { return views.erase(camera->getName()) == 0; });
+        return first - cameras.begin();
     }
 
     /// A camera that follows a target keeps the rotation that the library computes from it.
@@ -258,6 +266,7 @@ private:
         if (!collect(mMeshes, &FbxSdk::getNumberOfMeshes, 4, &FbxSdk::getMeshes))
             return false;
         mInfo.setTransformPoints(true);
+        leaveOutMeshesWithoutPolygons();
         const auto nodes = nodesOf(mMeshes, [](FbxNode& node) { return node.GetMesh() != nullptr; });
         mSdk.openClosePointCacheData(mSdk.getScene(), /*open=*/true);
         const MeshPlacement placement(mSdk, mOptions.local);
@@ -276,6 +285,15 @@ private:
             lose(static_cast<int>(moving), "written as they stand at the first frame (see --frames): moving meshes");
         }
         return true;
+    }
+
+    /// Of curves and loose edges the library reads the transform only, which can be written as one.
+    void leaveOutMeshesWithoutPolygons() {
+        auto& chosen = mMeshes.chosen;
+        const auto left = std::remove_if(chosen.begin(), chosen.end(),
+                                         [](const TnFbxMesh* mesh) { return mesh->getNumberOfPolygons() < 1; });
+        lose(static_cast<int>(chosen.end() - left), "not written: meshes without polygons");
+        chosen.erase(left, chosen.end());
     }
 
     static bool moves(const TnFbxMesh& mesh) {
@@ -367,14 +385,15 @@ int convert(const ConvertOptions& options) {
         printError(options.input, conversion.complaint());
         return kUnreadable;
     }
-    const bool written = conversion.write();
-    for (const std::string& loss : conversion.losses())
-        std::cerr << "tarnell-fbx: " << options.input << ": " << loss << '\n';
-    if (!written) {
+    return guarded(options.output, [&]() -> int {
+        const bool written = conversion.write();
+        for (const std::string& loss : conversion.losses())
+            std::cerr << "tarnell-fbx: " << options.input << ": " << loss << '\n';
+        if (written)
+            return kSuccess;
         printError(options.output, lastError());
         return kUnreadable;
-    }
-    return kSuccess;
+    });
 }
 
 } // namespace tool

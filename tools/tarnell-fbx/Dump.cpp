@@ -337,12 +337,6 @@ const std::vector<std::string>& dumpKinds() {
     return kNames;
 }
 
-void printError(const std::string& file, const std::string& reason) {
-    // The library's sentences begin with the file already.
-    const bool named = reason.rfind(file + ": ", 0) == 0;
-    std::cerr << "tarnell-fbx: " << (named ? "" : file + ": ") << reason << '\n';
-}
-
 int dump(const DumpOptions& options) {
     Dump dump(options, std::cout);
     if (!dump.load()) {

@@ -243,7 +243,8 @@ int info(const std::vector<std::string>& files) {
     for (std::size_t i = 0; i < files.size(); ++i) {
         if (i > 0)
             std::cout << '\n';
-        allRead = showFile(files[i]) && allRead;
+        const int status = guarded(files[i], [&]() -> int { return showFile(files[i]) ? kSuccess : kUnreadable; });
+        allRead = status == kSuccess && allRead;
     }
     std::cout << std::flush;
     return allRead ? kSuccess : kUnreadable;

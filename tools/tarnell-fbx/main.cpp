@@ -3,11 +3,14 @@
 //
 // tarnell-fbx: options and commands.
 #include <algorithm>
+#include <charconv>
+#include <cmath>
 #include <cstdio>
 #include <exception>
 #include <iostream>
 #include <map>
-#include <sstream>
+#include <string_view>
+#include <system_error>
 
 #include <CLI/CLI.hpp>
 
@@ -15,31 +18,43 @@
 
 namespace {
 
+/// The number that is the whole of the text.
+template <class Number>
+std::optional<Number> parse(std::string_view text) {
+    Number number = 0;
+    const char* const end = text.data() + text.size();
+    const auto [rest, error] = std::from_chars(text.data(), end, number);
+    return rest == end && error == std::errc() ? std::optional(number) : std::nullopt;
+}
+
 /// "A:B", or a single frame.
 std::string parseFrames(const std::string& text, std::optional<std::pair<int, int>>& frames) {
-    int first = 0, last = 0;
-    int used = 0;
-    const char* const end = text.c_str() + text.size();
-    if (std::sscanf(text.c_str(), "%d:%d%n", &first, &last, &used) == 2 && text.c_str() + used == end) {
-        if (first > last)
-            return "the range " + text + " ends before it starts";
-    } else if (std::sscanf(text.c_str(), "%d%n", &first, &used) == 1 && text.c_str() + used == end) {
-        last = first;
-    } else {
+    const std::size_t colon = text.find(':');
+    const std::optional<int> first = parse<int>(text.substr(0, colon));
+    const std::optional<int> last = colon == std::string::npos ? first : parse<int>(text.substr(colon + 1));
+    if (!first || !last)
         return "not a range of frames: " + text;
-    }
-    frames = {first, last};
+    if (*first > *last)
+        return "the range " + text + " ends before it starts";
+    frames = {*first, *last};
     return {};
+}
+
+/// For options whose number the command line's own conversion would take as well when it is empty, NaN or infinite.
+std::string refuseUnlessFinite(const std::string& text) {
+    const std::optional<float> number = parse<float>(text);
+    return number && std::isfinite(*number) ? "" : "not a number: " + text;
 }
 
 std::vector<std::string> parseKinds(const std::string& text, const std::vector<std::string>& known) {
     std::vector<std::string> kinds;
-    std::istringstream list(text);
-    for (std::string kind; std::getline(list, kind, ',');) {
-        if (std::find(known.begin(), known.end(), kind) == known.end()) {
-            throw CLI::ValidationError("--kind", "no such kind: " + kind);
-        }
+    for (std::size_t start = 0; start <= text.size();) { // also where nothing stands between or behind commas
+        const std::size_t end = std::min(text.find(',', start), text.size());
+        const std::string kind = text.substr(start, end - start);
+        if (std::find(known.begin(), known.end(), kind) == known.end())
+            throw CLI::ValidationError("--kind", "no such kind: \"" + kind + '"');
         kinds.push_back(kind);
+        start = end + 1;
     }
     return kinds;
 }
@@ -65,9 +80,11 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
             "Comma list of cameras, lights, markers, nulls, transforms, meshes (default: all six)")
         ->type_name("LIST");
     dump->add_flag("--local", options.local, "Local transforms instead of global ones");
-    dump->add_option("--frame", options.frame, "Frame at which static values and meshes are read");
+    dump->add_option("--frame", options.frame, "Frame at which static values and meshes are read")
+        ->check(refuseUnlessFinite);
     addFrames(*dump, options.frames, "A:B, meshes are read at every whole frame of the range");
-    dump->add_option("--sample-fps", options.sampleFps, "Sample at this many frames per second");
+    dump->add_option("--sample-fps", options.sampleFps, "Sample at this many frames per second")
+        ->check(refuseUnlessFinite);
     dump->add_flag_callback(
         "--no-transform-points", [&options] { options.transformPoints = false; },
         "Leave mesh points in the node's space, those of skins in the world");
@@ -110,6 +127,7 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
         ->type_name("LIST");
     addFrames(*convert, options.frames, "Points of meshes at every whole frame of A:B, as point caches");
     convert->add_option("--fps", options.fps, "Sample and write at this many frames per second")
+        ->check(refuseUnlessFinite)
         ->check(CLI::PositiveNumber);
     const std::map<std::string, tool::PointCache> caches = {
         {"maya", tool::PointCache::maya}, {"max", tool::PointCache::max}, {"none", tool::PointCache::none}};
@@ -141,7 +159,9 @@ int run(int argc, char** argv) {
     }
     if (*info)
         return tool::info(infoFiles);
-    return app.got_subcommand("convert") ? tool::convert(convertOptions) : tool::dump(dumpOptions);
+    if (app.got_subcommand("convert"))
+        return tool::guarded(convertOptions.input, [&] { return tool::convert(convertOptions); });
+    return tool::guarded(dumpOptions.file, [&] { return tool::dump(dumpOptions); });
 }
 
 } // namespace
@@ -149,7 +169,7 @@ int run(int argc, char** argv) {
 int main(int argc, char** argv) {
     try {
         return run(argc, argv);
-    } catch (const std::exception& error) { // mostly that there is no memory left
+    } catch (const std::exception& error) { // before a command had a file
         std::fprintf(stderr, "tarnell-fbx: %s\n", error.what());
         return tool::kUnreadable;
     }
