@@ -62,6 +62,21 @@ Samples rotationOf(const Camera& camera) {
             camera.getTransformValue(kRotationZ)};
 }
 
+/// A camera whose modes are not those of a new one nor any that is read.
+Camera cameraInOtherModes() {
+    Camera camera;
+    camera.setApertureMode(Camera::kFbxApertureVertical);
+    camera.setProjectionType(Camera::kFbxCameraOrthographic);
+    camera.setTransformRotationOrder(Transform::kFbxRotationOrderXYZ);
+    return camera;
+}
+
+TnFbxTime timeRecord(int startFrame, int endFrame, float rate) {
+    TnFbxTime time;
+    time.setTime(0.0f, startFrame, endFrame, rate);
+    return time;
+}
+
 // ---- Placement ----
 
 TEST(CameraExtraction, ReadsNamePlacementAndOrder) {
@@ -153,8 +168,12 @@ TEST(CameraExtraction, ComputesTheRotationForEveryFrameOfAnimatedIngredients) {
     node->GetCamera()->InterestPosition.Set({0.0, 0.0, -100.0});
     scene.key(node->LclTranslation, "X", {{0, 0.0f}, {3, 30.0f}});
     scene.key(node->GetCamera()->Roll, nullptr, {{-1, 0.0f}, {2, 90.0f}});
+    Camera camera;
+    for (const auto channel : {kRotationX, kRotationY, kRotationZ}) {
+        camera.setTransformValue(channel, 77.0f);
+    }
 
-    const Camera camera = readCamera(scene, node, {false, true});
+    EXPECT_TRUE(readInto(scene, node, camera, {false, true}));
 
     for (const auto channel : {kRotationX, kRotationY, kRotationZ}) {
         test::expectRange(camera.getTransformTime(channel), -1, 3, 24.0f);
@@ -167,7 +186,41 @@ TEST(CameraExtraction, ComputesTheRotationForEveryFrameOfAnimatedIngredients) {
         EXPECT_EQ(camera.getTransformValueAt(kRotationZ, at), expected[2]);
     }
     EXPECT_NE(camera.getTransformValueAt(kRotationY, 0.0f), camera.getTransformValueAt(kRotationY, 3.0f));
-    EXPECT_EQ(rotationOf(camera), Samples({0.0f, 0.0f, 0.0f})); // no static values
+    EXPECT_EQ(rotationOf(camera), Samples({77.0f, 77.0f, 77.0f})); // no static values
+}
+
+TEST(CameraExtraction, GivesAComputedRotationTheRateOfItsLastAnimatedIngredient) {
+    TestScene scene(0, 2);
+    fbxsdk::FbxNode* node = addCamera(scene);
+    scene.key(node->LclTranslation, "X", {{0, 0.0f}, {2, 20.0f}});
+    Camera camera; // the up vector is never sampled: these are the samples that the object brings
+    camera.setValueAt(Camera::kFbxCameraUpPositionX, timeRecord(1, 2, 60.0f), {0.0f, 0.0f});
+    camera.setValueAt(Camera::kFbxCameraUpPositionY, timeRecord(1, 5, 30.0f), Samples(5, 1.0f));
+    camera.setValueAt(Camera::kFbxCameraFarPlane, timeRecord(-9, 9, 120.0f), Samples(19, 1.0f)); // no ingredient
+
+    EXPECT_TRUE(readInto(scene, node, camera, {false, true}));
+    test::expectRange(camera.getTransformTime(kRotationX), 0, 5, 30.0f);
+
+    scene.key(node->GetCamera()->Roll, nullptr, {{0, 0.0f}, {1, 9.0f}});
+    EXPECT_TRUE(readInto(scene, node, camera, {false, true}));
+    test::expectRange(camera.getTransformTime(kRotationX), 0, 5, 24.0f);
+}
+
+TEST(CameraExtraction, TurnsInTheOrderZXYOnlyWhenItLooksAtSomething) {
+    TestScene scene;
+    fbxsdk::FbxNode* node = addCamera(scene);
+    node->SetRotationOrder(fbxsdk::FbxNode::eSourcePivot, fbxsdk::FbxEuler::eOrderYXZ);
+    const auto orderReadWith = [&](ReadOptions options) {
+        Camera camera = cameraInOtherModes();
+        EXPECT_TRUE(readInto(scene, node, camera, options));
+        return camera.getTransformRotationOrder();
+    };
+
+    EXPECT_EQ(orderReadWith({}), Transform::kFbxRotationOrderYXZ);
+    EXPECT_EQ(orderReadWith({/*global*/ false, /*useInterestPosition*/ true}), Transform::kFbxRotationOrderZXY);
+    node->SetTarget(scene.addNode("target"));
+    EXPECT_EQ(orderReadWith({/*global*/ false}), Transform::kFbxRotationOrderZXY);
+    EXPECT_EQ(orderReadWith({/*global*/ true}), Transform::kFbxRotationOrderZXY);
 }
 
 TEST(CameraExtraction, LooksAtTheTargetInTheWorld) {
@@ -192,19 +245,27 @@ TEST(CameraExtraction, LooksAtTheTargetInTheWorld) {
 TEST(CameraExtraction, TakesItsOwnTranslationForTheTargetsWhenReadLocally) {
     TestScene scene(0, 2);
     fbxsdk::FbxNode* node = addCamera(scene);
+    node->LclTranslation.Set({4.0, 5.0, 6.0});
     scene.key(node->LclTranslation, "X", {{0, 1.0f}, {2, 3.0f}});
     fbxsdk::FbxNode* target = scene.addNode("target");
     target->LclTranslation.Set({7.0, 8.0, 9.0});
     scene.key(target->LclTranslation, "X", {{0, 100.0f}, {2, 300.0f}});
     node->SetTarget(target);
+    const auto lookAt = {Camera::kFbxCameraLookAtPositionX, Camera::kFbxCameraLookAtPositionY,
+                         Camera::kFbxCameraLookAtPositionZ};
+    Camera camera;
+    for (const auto channel : lookAt) {
+        camera.setValue(channel, 77.0f);
+    }
 
-    const Camera camera = readCamera(scene, node);
+    EXPECT_TRUE(readInto(scene, node, camera));
 
     EXPECT_EQ(samplesOf(camera, Camera::kFbxCameraLookAtPositionX), samplesOf(camera, kPositionX));
     EXPECT_EQ(samplesOf(camera, Camera::kFbxCameraLookAtPositionX), Samples({1.0f, 2.0f, 3.0f}));
     EXPECT_FALSE(camera.getAnimated(Camera::kFbxCameraLookAtPositionY));
-    EXPECT_EQ(camera.getValue(Camera::kFbxCameraLookAtPositionX), 0.0f);
-    EXPECT_EQ(camera.getValue(Camera::kFbxCameraLookAtPositionY), 0.0f);
+    for (const auto channel : lookAt) {
+        EXPECT_EQ(camera.getValue(channel), 77.0f); // no static values
+    }
     EXPECT_EQ(camera.getTransformRotationOrder(), Transform::kFbxRotationOrderZXY);
 }
 
@@ -271,6 +332,37 @@ TEST(CameraExtraction, ReadsAperturePlanesAndProjection) {
     EXPECT_EQ(camera.getValue(Camera::kFbxCameraNearPlane), 0.5f);
     EXPECT_EQ(camera.getValue(Camera::kFbxCameraFarPlane), 1234.0f);
     EXPECT_EQ(camera.getProjectionType(), Camera::kFbxCameraOrthographic);
+}
+
+TEST(CameraExtraction, MapsProjections) {
+    TestScene scene;
+    fbxsdk::FbxNode* node = addCamera(scene);
+    Camera camera = cameraInOtherModes();
+
+    node->GetCamera()->ProjectionType.Set(fbxsdk::FbxCamera::ePerspective);
+    EXPECT_TRUE(readInto(scene, node, camera));
+    EXPECT_EQ(camera.getProjectionType(), Camera::kFbxCameraPerspective);
+
+    node->GetCamera()->ProjectionType.Set(fbxsdk::FbxCamera::eOrthogonal);
+    EXPECT_TRUE(readInto(scene, node, camera));
+    EXPECT_EQ(camera.getProjectionType(), Camera::kFbxCameraOrthographic);
+}
+
+TEST(CameraExtraction, MapsApertureModes) {
+    struct Row {
+        fbxsdk::FbxCamera::EApertureMode fbx;
+        Camera::EFbxCameraApertureMode mode;
+    };
+    const Row rows[] = {{fbxsdk::FbxCamera::eHorizAndVert, Camera::kFbxApertureHorizontalAndVertical},
+                        {fbxsdk::FbxCamera::eHorizontal, Camera::kFbxApertureFocalLength},
+                        {fbxsdk::FbxCamera::eVertical, Camera::kFbxApertureFocalLength},
+                        {fbxsdk::FbxCamera::eFocalLength, Camera::kFbxApertureFocalLength}};
+    for (const Row& row : rows) {
+        TestScene scene;
+        Camera camera = cameraInOtherModes();
+        EXPECT_TRUE(readInto(scene, addCamera(scene, row.fbx), camera));
+        EXPECT_EQ(camera.getApertureMode(), row.mode) << row.fbx;
+    }
 }
 
 TEST(CameraExtraction, KeepsTheProjectionForANumberThatIsNone) {

@@ -238,6 +238,34 @@ TEST(TransformWriting, KeysEveryComponentFromItsOwnChannel) {
     EXPECT_EQ(scene.node->LclTranslation.Get()[1], 2.0) << "the static value stays";
 }
 
+TEST(TransformWriting, KeysEveryComponentAtTheTimesOfItsOwnRange) {
+    TransformScene scene;
+    Transform transform = numberedTransform();
+    const std::pair<Transform::EFbxTransformChannelType, TnFbxTime> animated[] = {
+        {Transform::kFbxTransformPositionX, timeOf(0, 2)},        {Transform::kFbxTransformPositionY, timeOf(5, 2)},
+        {Transform::kFbxTransformPositionZ, timeOf(5, 2, 48.0f)}, {Transform::kFbxTransformRotationX, timeOf(0, 4)},
+        {Transform::kFbxTransformRotationY, timeOf(0, 2)},
+    };
+    for (const auto& [channel, time] : animated) {
+        transform.setTransformValueAt(channel, time, {1.0f, 2.0f, 3.0f, 4.0f});
+    }
+
+    EXPECT_TRUE(scene.sdk.setTransformCurveValues(scene.node, &transform));
+
+    const auto translation = [&](const char* component) {
+        return keysOf(scene.curve(scene.node->LclTranslation, component));
+    };
+    const auto rotation = [&](const char* component) {
+        return keysOf(scene.curve(scene.node->LclRotation, component));
+    };
+    EXPECT_THAT(translation("X"), ElementsAre(Pair(0, 1.0f), Pair(kFrame, 2.0f)));
+    EXPECT_THAT(translation("Y"), ElementsAre(Pair(5 * kFrame, 1.0f), Pair(6 * kFrame, 2.0f)));
+    EXPECT_THAT(translation("Z"), ElementsAre(Pair(5 * kFrame / 2, 1.0f), Pair(3 * kFrame, 2.0f)));
+    EXPECT_THAT(rotation("X"),
+                ElementsAre(Pair(0, 1.0f), Pair(kFrame, 2.0f), Pair(2 * kFrame, 3.0f), Pair(3 * kFrame, 4.0f)));
+    EXPECT_THAT(rotation("Y"), ElementsAre(Pair(0, 1.0f), Pair(kFrame, 2.0f)));
+}
+
 TEST(TransformWriting, GivesComponentsWithoutSamplesACurveWithoutKeys) {
     TransformScene scene;
     Transform transform = numberedTransform();

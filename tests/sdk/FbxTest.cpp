@@ -12,8 +12,12 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <fstream>
+#include <iterator>
 #include <memory>
 #include <string>
+#include <vector>
 
 namespace Tarnell::Fbx {
 namespace {
@@ -40,6 +44,24 @@ TnFbxReadInfo optionsFor(const char* name, const char* objectName) {
     info.setAllObjects(false);
     info.setObjectName(objectName);
     return info;
+}
+
+std::string textOf(const char* name) {
+    std::ifstream in(dataFile(name), std::ios::binary);
+    return {std::istreambuf_iterator<char>(in), {}};
+}
+
+/// Where a part of a file starts, which is there once.
+std::size_t startOf(const std::string& text, const std::string& part) {
+    const std::size_t start = text.find(part);
+    EXPECT_NE(start, std::string::npos) << part;
+    EXPECT_EQ(text.find(part, start + 1), std::string::npos) << part;
+    return std::min(start, text.size());
+}
+
+/// The text with one part of it replaced.
+std::string edited(std::string text, const std::string& part, const std::string& replacement) {
+    return text.replace(startOf(text, part), part.size(), replacement);
 }
 
 template <class Object>
@@ -142,21 +164,38 @@ TEST(FbxReading, FailsForAFileThatIsNotThere) {
     });
 }
 
-TEST(FbxReading, FailsForAFileThatStopsInTheMiddle) {
+TEST(FbxReading, FailsForAFileThatStopsWithinABlock) {
     const support::TemporaryFolder folder;
-    const std::string whole = [] {
-        std::ifstream in(dataFile("mesh_7400_ascii.fbx"), std::ios::binary);
-        return std::string(std::istreambuf_iterator<char>(in), {});
-    }();
-    ASSERT_FALSE(whole.empty());
-    TnFbxReadInfo info = optionsFor("");
-    info.setFileName(folder.write("cut.fbx", whole.substr(0, whole.size() / 2)));
+    const std::string whole = textOf("mesh_7400_ascii.fbx");
+    const std::size_t ends[] = {startOf(whole, "FBXVersion"),    startOf(whole, "Vertices: *15"),
+                                startOf(whole, "0,1,2,-4"),      startOf(whole, "LayerElementUV: 0"),
+                                startOf(whole, "10,0,0"),        startOf(whole, "Material: 3"),
+                                startOf(whole, "C: \"OO\",1,2"), whole.size() - 2};
+    for (const std::size_t end : ends) {
+        TnFbxReadInfo info = optionsFor("");
+        info.setFileName(folder.write("cut.fbx", whole.substr(0, end)));
 
-    const Read read(&Fbx::getMeshes, info);
+        const Read read(&Fbx::getMeshes, info);
 
-    if (!read.result) { // repaired or refused
-        EXPECT_THAT(lastError(), HasSubstr("cut.fbx"));
-        EXPECT_EQ(read.objects, nullptr);
+        EXPECT_FALSE(read.result) << end;
+        EXPECT_EQ(read.count, 0) << end;
+        EXPECT_EQ(read.objects, nullptr) << end;
+        EXPECT_THAT(lastError(), HasSubstr("cut.fbx: line ")) << end;
+    }
+}
+
+TEST(FbxReading, TakesAFileThatStopsBetweenBlocksForAWholeOne) {
+    const support::TemporaryFolder folder;
+    const std::string whole = textOf("mesh_7400_ascii.fbx");
+    for (const char* next : {"Objects:", "Connections:"}) { // no mesh yet, and none that stands below the root
+        TnFbxReadInfo info = optionsFor("");
+        info.setFileName(folder.write("cut.fbx", whole.substr(0, startOf(whole, next))));
+
+        const Read read(&Fbx::getMeshes, info);
+
+        EXPECT_TRUE(read.result) << next << lastError();
+        EXPECT_EQ(read.count, 0) << next;
+        EXPECT_EQ(read.objects, nullptr) << next;
     }
 }
 
@@ -206,6 +245,88 @@ TEST(FbxReading, HandsOutNothingForANameThatNoNodeOfTheKindBears) {
         EXPECT_EQ(read.count, 0);
         EXPECT_EQ(read.objects, nullptr);
     }
+}
+
+TEST(FbxReading, ByNameFindsTheNodesOfTheKindAndNoOthers) {
+    struct Row {
+        const char* file;
+        const char* name;
+        Names kinds; // of which the node is an object
+    };
+    const Row rows[] = {{"mesh_7400_ascii.fbx", "shape", {"meshes", "transforms"}},
+                        {"camera_7400_ascii.fbx", "shot", {"cameras"}},
+                        {"lights_7400_ascii.fbx", "spot", {"lights"}},
+                        {"markers_7400_ascii.fbx", "capsule", {"markers", "transforms"}},
+                        {"nulls_7400_ascii.fbx", "child", {"nulls", "transforms"}}};
+    for (const Row& row : rows) {
+        forEachReader([&row](auto reader, const std::string& kind) {
+            const Read read(reader, optionsFor(row.file, row.name));
+            const bool isOfKind = std::find(row.kinds.begin(), row.kinds.end(), kind) != row.kinds.end();
+
+            EXPECT_TRUE(read.result) << kind << " of " << row.file << ": " << lastError();
+            EXPECT_EQ(read.names(), isOfKind ? Names({row.name}) : Names()) << kind << " of " << row.file;
+            EXPECT_EQ(read.objects == nullptr, !isOfKind) << kind << " of " << row.file;
+        });
+    }
+}
+
+TEST(FbxReading, ByNameHandsOutTheValuesOfTheNode) {
+    const Read mesh(&Fbx::getMeshes, optionsFor("mesh_7400_ascii.fbx", "shape"));
+    ASSERT_EQ(mesh.count, 1);
+    EXPECT_EQ(mesh.objects[0].getNumberOfPolygons(), 2);
+    EXPECT_EQ(mesh.objects[0].getTransformValue(Transform::kFbxTransformPositionX), 10.0f);
+
+    const Read marker(&Fbx::getMarkers, optionsFor("markers_7400_ascii.fbx", "sphere"));
+    ASSERT_EQ(marker.count, 1);
+    EXPECT_EQ(marker.objects[0].getMarkerSize(), 12.0f);
+    EXPECT_EQ(marker.objects[0].getMarkerLookType(), TnFbxMarker::kFbxMarkerLookSphere);
+
+    const Read null(&Fbx::getNulls, optionsFor("nulls_7400_ascii.fbx", "parent"));
+    ASSERT_EQ(null.count, 1);
+    EXPECT_EQ(null.objects[0].getNullSize(), 25.0f);
+
+    const Read transform(&Fbx::getTransforms, optionsFor("markers_7400_ascii.fbx", "capsule"));
+    ASSERT_EQ(transform.count, 1);
+    EXPECT_EQ(transform.objects[0].getTransformValue(Transform::kFbxTransformPositionX), 2.0f);
+}
+
+TEST(FbxReading, ByNameTellsAMeshFromANullOfItsName) {
+    const support::TemporaryFolder folder;
+    const std::string withNull =
+        edited(textOf("mesh_7400_ascii.fbx"), "Model: 2,",
+               "Model: 9, \"Model::shape\", \"Null\" {\nProperties70:  {\n"
+               "P: \"Lcl Translation\", \"Lcl Translation\", \"\", \"A\",5,0,0\n}\n}\nModel: 2,");
+    TnFbxReadInfo info = optionsFor("", "shape");
+    info.setFileName(folder.write("twins.fbx", edited(withNull, "C: \"OO\",2,0", "C: \"OO\",9,0\nC: \"OO\",2,0")));
+
+    const Read meshes(&Fbx::getMeshes, info);
+    const Read nulls(&Fbx::getNulls, info);
+    const Read transforms(&Fbx::getTransforms, info);
+
+    ASSERT_EQ(meshes.names(), Names({"shape"}));
+    EXPECT_EQ(meshes.objects[0].getTransformValue(Transform::kFbxTransformPositionX), 10.0f);
+    ASSERT_EQ(nulls.names(), Names({"shape"}));
+    EXPECT_EQ(nulls.objects[0].getTransformValue(Transform::kFbxTransformPositionX), 5.0f);
+    ASSERT_EQ(transforms.names(), Names({"shape"}));
+    EXPECT_EQ(transforms.objects[0].getTransformValue(Transform::kFbxTransformPositionX),
+              5.0f); // the first in the tree
+}
+
+TEST(FbxReading, ByNameHandsOutTheFirstOfSeveralThatBearIt) {
+    const support::TemporaryFolder folder;
+    TnFbxReadInfo info = optionsFor("", "parent");
+    info.setFileName(
+        folder.write("twice.fbx", edited(textOf("nulls_7400_ascii.fbx"), "Model::child", "Model::parent")));
+
+    const Read read(&Fbx::getNulls, info);
+
+    EXPECT_TRUE(read.result) << lastError();
+    ASSERT_EQ(read.names(), Names({"parent"}));
+    EXPECT_EQ(read.objects[0].getNullSize(), 25.0f); // the second has size 1 and stands at X 11
+    EXPECT_EQ(read.objects[0].getTransformValue(Transform::kFbxTransformPositionX), 1.0f);
+
+    info.setAllObjects(true);
+    EXPECT_EQ(Read(&Fbx::getNulls, info).names(), Names({"parent", "parent"}));
 }
 
 TEST(FbxReading, HandsOutProducerCamerasAlsoOfAFileWithoutCameras) {

@@ -22,12 +22,13 @@ using Samples = std::vector<float>;
 template <class Object>
 using Reader = bool (FbxSdk::*)(TnFbxTime&, bool, bool, float, fbxsdk::FbxNode*, Object&, fbxsdk::FbxAMatrix&);
 
-/// Reads a node's object locally over the stack's range.
+/// Reads a node's object locally over the stack's range, with key frames converted to a sample rate if there is one.
 template <class Object>
-bool readInto(TestScene& scene, Reader<Object> reader, fbxsdk::FbxNode* node, Object& object, bool global = false) {
+bool readInto(TestScene& scene, Reader<Object> reader, fbxsdk::FbxNode* node, Object& object, bool global = false,
+              float sampleRate = 0.0f) {
     TnFbxTime time = scene.time();
     fbxsdk::FbxAMatrix geometric;
-    return (scene.sdk.*reader)(time, global, false, 0.0f, node, object, geometric);
+    return (scene.sdk.*reader)(time, global, sampleRate > 0.0f, sampleRate, node, object, geometric);
 }
 
 Light readLight(TestScene& scene, fbxsdk::FbxNode* node) {
@@ -108,8 +109,10 @@ TEST(LightExtraction, SamplesColourAndConeButNotTheAlpha) {
     scene.key(source->Color, "Y", {{0, 0.25f}, {1, 0.5f}});
     scene.key(source->Color, "Z", {{0, 1.0f}, {1, 0.0f}});
     scene.key(source->OuterAngle, nullptr, {{0, 30.0f}, {1, 60.0f}});
+    Light light;
+    light.setValue(Light::kFbxLightAlpha, 0.5f);
 
-    const Light light = readLight(scene, node);
+    EXPECT_TRUE(readInto(scene, &FbxSdk::getLight, node, light));
 
     EXPECT_EQ(samplesOf(light, Light::kFbxLightRed), Samples({0.0f, 1.0f}));
     EXPECT_EQ(samplesOf(light, Light::kFbxLightGreen), Samples({0.25f, 0.5f}));
@@ -194,12 +197,15 @@ TEST(MarkerExtraction, SamplesTheColourAndNeitherAlphaNorSize) {
     scene.key(node->GetNodeAttribute()->Color, "Y", {{0, 0.5f}, {1, 1.0f}});
     scene.key(node->GetMarker()->Size, nullptr, {{0, 5.0f}, {1, 6.0f}});
     node->GetMarker()->Size.Set(4.0);
+    Marker marker;
+    marker.setValue(Marker::kFbxMarkerAlpha, 0.5f);
 
-    const Marker marker = readMarker(scene, node);
+    EXPECT_TRUE(readInto(scene, &FbxSdk::getMarker, node, marker));
 
     EXPECT_EQ(samplesOf(marker, Marker::kFbxMarkerGreen), Samples({0.5f, 1.0f}));
     EXPECT_FALSE(marker.getAnimated(Marker::kFbxMarkerRed));
     EXPECT_FALSE(marker.getAnimated(Marker::kFbxMarkerAlpha));
+    EXPECT_EQ(marker.getValue(Marker::kFbxMarkerAlpha), 1.0f);
     EXPECT_EQ(marker.getMarkerSize(), 4.0f);
 }
 
@@ -297,6 +303,54 @@ TEST(LightMarkerNullExtraction, ReadsTransformsInTheWorldWhenAsked) {
     for (const TnFbxTransform* object : std::initializer_list<const TnFbxTransform*>{&light, &marker, &null}) {
         EXPECT_EQ(object->getTransformValue(TnFbxTransform::kFbxTransformPositionX), 10.0f);
     }
+}
+
+// ---- Another rate ----
+
+constexpr auto kPositionX = TnFbxTransform::kFbxTransformPositionX;
+
+/// An object of a node whose X position is keyed at the frames 0 and 10, read at twice the rate of its scene.
+template <class Attribute, class Object, class Keys>
+Object readAtTwiceTheRate(Reader<Object> reader, Keys&& addKeys) {
+    TestScene scene(0, 0);
+    fbxsdk::FbxNode* node = scene.add<Attribute>("node");
+    scene.key(node->LclTranslation, "X", {{0, 0.0f}, {10, 10.0f}});
+    addKeys(scene, *node);
+    Object object;
+    EXPECT_TRUE(readInto(scene, reader, node, object, /*global*/ false, 48.0f));
+    return object;
+}
+
+TEST(LightExtraction, ConvertsKeyFramesToTheSampleRate) {
+    const auto light =
+        readAtTwiceTheRate<fbxsdk::FbxLight, Light>(&FbxSdk::getLight, [](TestScene& scene, fbxsdk::FbxNode& node) {
+            scene.key(node.GetLight()->Color, "X", {{0, 0.0f}, {10, 1.0f}});
+            scene.key(node.GetLight()->Intensity, nullptr, {{0, 0.0f}, {10, 100.0f}});
+            scene.key(node.GetLight()->OuterAngle, nullptr, {{0, 0.0f}, {10, 60.0f}});
+        });
+
+    test::expectRange(light.getTransformTime(kPositionX), 0, 20, 24.0f);
+    for (const auto channel : {Light::kFbxLightRed, Light::kFbxLightIntensity, Light::kFbxLightConeAngle}) {
+        test::expectRange(light.getTime(channel), 0, 20, 24.0f);
+    }
+    EXPECT_EQ(light.getValueAt(Light::kFbxLightConeAngle, 5.0f), 30.0f); // the frames are still those of the scene
+}
+
+TEST(MarkerExtraction, ConvertsKeyFramesToTheSampleRate) {
+    const auto marker =
+        readAtTwiceTheRate<fbxsdk::FbxMarker, Marker>(&FbxSdk::getMarker, [](TestScene& scene, fbxsdk::FbxNode& node) {
+            scene.key(node.GetNodeAttribute()->Color, "X", {{0, 0.0f}, {10, 1.0f}});
+        });
+
+    test::expectRange(marker.getTransformTime(kPositionX), 0, 20, 24.0f);
+    test::expectRange(marker.getTime(Marker::kFbxMarkerRed), 0, 20, 24.0f);
+}
+
+TEST(NullExtraction, ConvertsKeyFramesToTheSampleRate) {
+    const auto null =
+        readAtTwiceTheRate<fbxsdk::FbxNull, TnFbxNull>(&FbxSdk::getNull, [](TestScene&, fbxsdk::FbxNode&) {});
+
+    test::expectRange(null.getTransformTime(kPositionX), 0, 20, 24.0f);
 }
 
 } // namespace

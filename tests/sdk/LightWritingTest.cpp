@@ -115,12 +115,13 @@ TEST(LightWriting, LeavesTheDecayOfDirectionalLightsAndWhatIsNoDecay) {
 }
 
 TEST(LightWriting, TurnsDirectionalAndSpotLightsAboutX) {
-    for (const auto type : {Light::kFbxLightPoint, Light::kFbxLightDirectional, Light::kFbxLightSpot}) {
+    constexpr auto kNoType = static_cast<Light::EFbxLightType>(3);
+    for (const auto type : {Light::kFbxLightPoint, Light::kFbxLightDirectional, Light::kFbxLightSpot, kNoType}) {
         LightScene scene(type);
         EXPECT_TRUE(scene.write());
 
         const fbxsdk::FbxVector4 turn = scene.node->GetPostRotation(fbxsdk::FbxNode::eSourcePivot);
-        const bool turned = type != Light::kFbxLightPoint;
+        const bool turned = type == Light::kFbxLightDirectional || type == Light::kFbxLightSpot;
         EXPECT_EQ(turn[0], turned ? -90.0 : 0.0);
         EXPECT_EQ(turn[1], 0.0);
         EXPECT_EQ(turn[2], 0.0);

@@ -337,13 +337,25 @@ TEST(Skin, PassesOverClustersWithoutALink) {
 }
 
 TEST(Skin, IgnoresTinyWeights) {
-    TestScene scene;
-    fbxsdk::FbxNode* node = addPoints(scene, 1);
-    FbxCluster* cluster = addCluster(scene, addSkin(scene, node), {4.0, 0.0, 0.0});
-    cluster->AddControlPointIndex(0, 0.000001);
-    cluster->AddControlPointIndex(0, -0.000001);
+    for (const auto mode : {FbxCluster::eNormalize, FbxCluster::eTotalOne, FbxCluster::eAdditive}) {
+        SCOPED_TRACE(mode);
+        TestScene scene;
+        fbxsdk::FbxNode* node = addPoints(scene, 3);
+        fbxsdk::FbxSkin* skin = addSkin(scene, node);
+        FbxCluster* near = addCluster(scene, skin, {4.0, 0.0, 0.0}, mode);
+        FbxCluster* far = addCluster(scene, skin, {1e6, 0.0, 0.0}, mode); // a millionth of it is a whole unit
+        near->AddControlPointIndex(0, 1.0);
+        far->AddControlPointIndex(0, 0.000001);
+        near->AddControlPointIndex(1, 1.0);
+        far->AddControlPointIndex(1, -0.000001);
+        far->AddControlPointIndex(2, 0.000001);
 
-    expectPoint(deformed(scene, node)[0], 0.0, 0.0, 0.0);
+        const Points points = deformed(scene, node);
+
+        EXPECT_EQ(points[0], FbxVector4(4.0, 0.0, 0.0));
+        EXPECT_EQ(points[1], FbxVector4(5.0, 0.0, 0.0));
+        EXPECT_EQ(points[2], FbxVector4(2.0, 0.0, 0.0));
+    }
 }
 
 TEST(Skin, AccumulatesAWeightAtTheThresholdThoughATotalThereDeformsNothing) {
@@ -618,6 +630,17 @@ struct CacheScene : TestScene {
 
 class VertexCache : public testing::TestWithParam<FbxCache::EFileFormat> {};
 INSTANTIATE_TEST_SUITE_P(BothFormats, VertexCache, testing::Values(FbxCache::eMayaCache, FbxCache::eMaxPointCacheV2));
+
+TEST_P(VertexCache, GivesThePointsOfTheFrameWhateverRateThisThreadCountsAt) {
+    CacheScene scene(GetParam());
+    ASSERT_TRUE(scene.sdk.openClosePointCacheData(scene.scene, true));
+    fbxsdk::FbxTime::SetGlobalTimeMode(fbxsdk::FbxTime::eFrames60);
+
+    const Points points = deformed(scene, scene.node, 2);
+
+    EXPECT_EQ(points[0][2], 2.0);
+    scene.sdk.openClosePointCacheData(scene.scene, false);
+}
 
 TEST_P(VertexCache, GivesThePointsOfTheFrame) {
     CacheScene scene(GetParam());

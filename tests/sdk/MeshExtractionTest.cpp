@@ -11,6 +11,9 @@
 
 #include <array>
 #include <limits>
+#include <memory>
+#include <stdexcept>
+#include <string>
 
 namespace Tarnell::Fbx {
 namespace {
@@ -26,6 +29,7 @@ struct ReadOptions {
     bool transformPoints = false;
     bool global = false;
     float frame = 0.0f;
+    float sampleRate = 0.0f; // converts key frames when above 0
 };
 
 bool readInto(TestScene& scene, fbxsdk::FbxNode* node, TnFbxMesh& mesh, ReadOptions options = {}) {
@@ -36,7 +40,8 @@ bool readInto(TestScene& scene, fbxsdk::FbxNode* node, TnFbxMesh& mesh, ReadOpti
                          node->GetGeometricRotation(fbxsdk::FbxNode::eSourcePivot),
                          node->GetGeometricScaling(fbxsdk::FbxNode::eSourcePivot));
     }
-    return scene.sdk.getMesh(time, options.global, false, 0.0f, node, options.transformPoints, mesh, geometric);
+    return scene.sdk.getMesh(time, options.global, options.sampleRate > 0.0f, options.sampleRate, node,
+                             options.transformPoints, mesh, geometric);
 }
 
 TnFbxMesh readMesh(TestScene& scene, fbxsdk::FbxNode* node, ReadOptions options = {}) {
@@ -134,6 +139,32 @@ void addLambert(TestScene& scene, fbxsdk::FbxNode* node, double red, double tran
     material->TransparencyFactor.Set(transparency);
     node->AddMaterial(material);
 }
+
+// No call damages an element. What an explicit instantiation names may be private: so its array can be taken away.
+template <class Value>
+using DirectArray = std::unique_ptr<fbxsdk::FbxLayerElementArrayTemplate<Value>>;
+void removeDirectArray(fbxsdk::FbxLayerElementTemplate<FbxVector4>& element);
+void removeDirectArray(fbxsdk::FbxLayerElementTemplate<FbxVector2>& element);
+void removeDirectArray(fbxsdk::FbxLayerElementTemplate<FbxColor>& element);
+template <class Value, DirectArray<Value> fbxsdk::FbxLayerElementTemplate<Value>::*kArray>
+struct DirectArrayRemoval {
+    friend void removeDirectArray(fbxsdk::FbxLayerElementTemplate<Value>& element) { (element.*kArray).reset(); }
+};
+template struct DirectArrayRemoval<FbxVector4, &fbxsdk::FbxLayerElementTemplate<FbxVector4>::mDirectArray>;
+template struct DirectArrayRemoval<FbxVector2, &fbxsdk::FbxLayerElementTemplate<FbxVector2>::mDirectArray>;
+template struct DirectArrayRemoval<FbxColor, &fbxsdk::FbxLayerElementTemplate<FbxColor>::mDirectArray>;
+
+/// Reads a mesh that is damaged; what the reader throws.
+std::string messageOfReading(TestScene& scene, fbxsdk::FbxNode* node, TnFbxMesh& mesh) {
+    try {
+        readInto(scene, node, mesh);
+    } catch (const std::runtime_error& error) {
+        return error.what();
+    }
+    return "";
+}
+
+constexpr const char* kMissingDirectArray = "FbxLayerElementArrayTemplate - mDirectArray is NULL";
 
 const std::vector<FbxVector4> kSevenNormals = {{0.0, 0.0, 1.0}, {0.0, 0.0, 2.0}, {0.0, 0.0, 3.0}, {0.0, 0.0, 4.0},
                                                {0.0, 0.0, 5.0}, {0.0, 0.0, 6.0}, {0.0, 0.0, 7.0}};
@@ -250,6 +281,16 @@ TEST(MeshExtraction, ReplacesWhatTheObjectHeld) {
     EXPECT_FALSE(mesh.getValidNormals());
 }
 
+TEST(MeshExtraction, ConvertsKeyFramesToTheSampleRate) {
+    TestScene scene(0, 0);
+    fbxsdk::FbxNode* node = addTwoPolygons(scene);
+    scene.key(node->LclTranslation, "X", {{0, 0.0f}, {10, 10.0f}});
+
+    const TnFbxMesh mesh = readMesh(scene, node, {false, false, 0.0f, /*sampleRate*/ 48.0f});
+
+    test::expectRange(mesh.getTransformTime(TnFbxTransform::kFbxTransformPositionX), 0, 20, 24.0f);
+}
+
 // ---- Baking ----
 
 TEST(MeshBaking, MultipliesByTheLocalTransformTimesTheGeometricOne) {
@@ -302,6 +343,47 @@ TEST(MeshBaking, TurnsNormalsByTheRotationAlone) {
     EXPECT_EQ(normalOf(readMesh(scene, node), 1), Floats({0.0f, 0.0f, 2.0f}));
 }
 
+void expectNear(const Floats& values, const Floats& expected) {
+    EXPECT_THAT(values, testing::Pointwise(testing::FloatNear(1e-5f), expected));
+}
+
+/// Turned by its geometric rotation about X, then by its own about Z.
+fbxsdk::FbxNode* addTurnedPolygons(TestScene& scene) {
+    fbxsdk::FbxNode* node = addTwoPolygons(scene);
+    node->LclRotation.Set({0.0, 0.0, 90.0});
+    node->SetGeometricRotation(fbxsdk::FbxNode::eSourcePivot, FbxVector4(90.0, 0.0, 0.0));
+    setNormals(node, Element::eByPolygonVertex, Element::eDirect, std::vector<FbxVector4>(7, {0.0, 1.0, 2.0}));
+    return node;
+}
+
+TEST(MeshBaking, TurnsPointsAndNormalsByTheGeometricRotationFirst) {
+    for (const bool global : {false, true}) {
+        SCOPED_TRACE(global);
+        TestScene scene;
+        fbxsdk::FbxNode* node = addTurnedPolygons(scene);
+        node->LclTranslation.Set({10.0, 0.0, 0.0});
+
+        const TnFbxMesh mesh = readMesh(scene, node, {/*transformPoints*/ true, global});
+
+        expectNear(pointOf(mesh, 2), {10.0f, 1.0f, 1.0f}); // (1, 1, 0) by way of (1, 0, 1)
+        expectNear(normalOf(mesh, 0), {2.0f, 0.0f, 1.0f}); // (0, 1, 2) by way of (0, −2, 1)
+    }
+}
+
+TEST(MeshBaking, AppliesTheAnglesOfTheOriginInTheOrderXYZ) {
+    TestScene scene;
+
+    const TnFbxMesh mesh = readMesh(scene, addTurnedPolygons(scene), {/*transformPoints*/ true, /*global*/ true});
+
+    // There the angles are those that give the rotation in the order ZXY.
+    expectNear({mesh.getTransformValue(TnFbxTransform::kFbxTransformRotationX),
+                mesh.getTransformValue(TnFbxTransform::kFbxTransformRotationY),
+                mesh.getTransformValue(TnFbxTransform::kFbxTransformRotationZ)},
+               {0.0f, 90.0f, 90.0f});
+    expectNear(pointOf(mesh, 2), {-1.0f, 0.0f, -1.0f});
+    expectNear(normalOf(mesh, 0), {-1.0f, 2.0f, 0.0f});
+}
+
 // ---- Normals ----
 
 TEST(MeshNormals, ByPolygonVertexDirect) {
@@ -324,6 +406,18 @@ TEST(MeshNormals, ByPolygonVertexIndexed) {
 
     const TnFbxMesh mesh = readMesh(scene, node);
 
+    EXPECT_EQ(normalOf(mesh, 0), Floats({0.0f, 0.0f, 7.0f}));
+    EXPECT_EQ(normalOf(mesh, 6), Floats({0.0f, 0.0f, 1.0f}));
+}
+
+TEST(MeshNormals, ByPolygonVertexWithAnIndexAloneAreReadThroughIt) {
+    TestScene scene;
+    fbxsdk::FbxNode* node = addTwoPolygons(scene);
+    setNormals(node, Element::eByPolygonVertex, Element::eIndex, kSevenNormals, {6, 5, 4, 3, 2, 1, 0});
+
+    const TnFbxMesh mesh = readMesh(scene, node);
+
+    EXPECT_TRUE(mesh.getValidNormals());
     EXPECT_EQ(normalOf(mesh, 0), Floats({0.0f, 0.0f, 7.0f}));
     EXPECT_EQ(normalOf(mesh, 6), Floats({0.0f, 0.0f, 1.0f}));
 }
@@ -389,6 +483,27 @@ TEST(MeshNormals, OfLaterLayersAreNotRead) {
     EXPECT_FALSE(mesh.getValidNormals());
     EXPECT_FALSE(mesh.getValidUVs());
     EXPECT_EQ(uvOf(mesh, 0), kZero2);
+}
+
+TEST(MeshNormals, OfAnElementWithoutDirectArrayThrowAndLeaveTheMeshPartlyFilled) {
+    for (const auto mapping : {Element::eByControlPoint, Element::eByPolygonVertex}) {
+        TestScene scene;
+        fbxsdk::FbxNode* node = addTwoPolygons(scene);
+        setNormals(node, mapping, Element::eDirect, kSevenNormals);
+        setUVs(node, Element::eByControlPoint, Element::eDirect, std::vector<FbxVector2>(5, FbxVector2(0.5, 0.5)));
+        removeDirectArray(*layerOf(node).GetNormals());
+        TnFbxMesh mesh;
+
+        EXPECT_EQ(messageOfReading(scene, node, mesh), kMissingDirectArray);
+
+        EXPECT_EQ(mesh.getName(), "mesh");
+        EXPECT_EQ(mesh.getNumberOfPolygons(), 2);
+        EXPECT_EQ(mesh.getNumberOfPolygonVertices(), 7);
+        EXPECT_EQ(pointOf(mesh, 4), Floats({0.0f, 2.0f, 0.0f}));
+        EXPECT_EQ(normalOf(mesh, 6), kZero3);
+        EXPECT_EQ(uvOf(mesh, 6), kZero2);
+        EXPECT_FALSE(mesh.getValidNormals() || mesh.getValidUVs() || mesh.getValidColours());
+    }
 }
 
 // ---- Texture coordinates ----
@@ -459,6 +574,21 @@ TEST(MeshUVs, OfOtherTextureChannelsAreNotRead) {
                          Element::eTextureBump);
 
     EXPECT_FALSE(readMesh(scene, node).getValidUVs());
+}
+
+TEST(MeshUVs, OfAnElementWithoutDirectArrayThrow) {
+    TestScene scene;
+    fbxsdk::FbxNode* node = addTwoPolygons(scene);
+    setNormals(node, Element::eByPolygonVertex, Element::eDirect, kSevenNormals);
+    setUVs(node, Element::eByPolygonVertex, Element::eIndexToDirect, {{0.5, 0.5}}, {0, 0, 0, 0, 0, 0, 0});
+    removeDirectArray(*layerOf(node).GetUVs());
+    TnFbxMesh mesh;
+
+    EXPECT_EQ(messageOfReading(scene, node, mesh), kMissingDirectArray);
+
+    EXPECT_EQ(mesh.getPointIndex(6), 4);
+    EXPECT_EQ(uvOf(mesh, 6), kZero2);
+    EXPECT_FALSE(mesh.getValidNormals() || mesh.getValidUVs()) << "nothing is valid of a mesh that is read in part";
 }
 
 // ---- Colours ----
@@ -603,6 +733,20 @@ TEST(MeshColours, OfAnInstanceComeFromTheFirstNode) {
     setMaterials(node, Element::eByPolygon, Element::eIndexToDirect, {0, 0});
 
     EXPECT_EQ(colourOf(readMesh(scene, instance), 0)[0], 0.75f);
+}
+
+TEST(MeshColours, OfAnElementWithoutDirectArrayThrow) {
+    TestScene scene;
+    fbxsdk::FbxNode* node = addTwoPolygons(scene);
+    setColours(node, Element::eByControlPoint, Element::eDirect, {{0.5, 0.5, 0.5, 0.5}});
+    removeDirectArray(*layerOf(node).GetVertexColors());
+    TnFbxMesh mesh;
+
+    EXPECT_EQ(messageOfReading(scene, node, mesh), kMissingDirectArray);
+
+    EXPECT_EQ(mesh.getPointIndex(6), 4);
+    EXPECT_EQ(colourOf(mesh, 6), kWhite);
+    EXPECT_FALSE(mesh.getValidColours());
 }
 
 TEST(MeshExtraction, PassesOnNumbersThatAreNone) {

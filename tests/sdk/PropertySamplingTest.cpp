@@ -59,11 +59,30 @@ TEST(SampleRange, ConvertsFramesByDividingFirstAndTruncatesTowardZero) {
     EXPECT_EQ(detail::convertFrame(0, 24.0f, std::numeric_limits<float>::infinity()), kLowest);
 }
 
+TEST(SampleRange, RoundsToSinglePrecisionAfterEveryStepOfTheConversion) {
+    EXPECT_EQ(detail::convertFrame(63, 30.0f, 60.0f), 125);  // 126 in double precision or multiplied first
+    EXPECT_EQ(detail::convertFrame(123, 30.0f, 60.0f), 246); // 245 in double precision
+    EXPECT_EQ(detail::convertFrame(120, 24.0f, 25.0f), 125); // 124 times the quotient of the rates
+    EXPECT_EQ(detail::convertFrame(50, 24.0f, 60.0f), 124);  // 125 in double precision or multiplied first
+}
+
 TEST(SampleRange, UntouchedCountsAsAnAnimationWithoutFrames) {
     const detail::SampleRange range;
 
     EXPECT_TRUE(range.isAnimation());
     EXPECT_LT(range.last, range.first);
+}
+
+TEST(SampleRange, UntouchedReachesBackwardsOverAllFramesAtNoRate) {
+    test::expectRange(detail::sampledTime(detail::SampleRange(), 24.0f), 2147483647, -2147483647 - 1, 0.0f);
+}
+
+TEST(SampleRange, WithFramesHasTheRateOfTheScene) {
+    detail::SampleRange range;
+    range.include(-3, 7);
+    const TnFbxTime time = detail::sampledTime(range, 24.0f);
+    test::expectRange(time, -3, 7, 24.0f);
+    EXPECT_EQ(time.getFrame(), 0.0f);
 }
 
 TEST(SampleRange, OfOneFrameIsNoAnimation) {

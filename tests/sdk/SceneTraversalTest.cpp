@@ -1,15 +1,13 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Counting, naming and listing nodes, and the time that a scene's animation covers.
+// Counting, naming and listing nodes.
 #include "support/SceneBuilders.h"
 
 #include "TnFbxError.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-
-#include <limits>
 
 namespace Tarnell::Fbx {
 namespace {
@@ -43,13 +41,20 @@ void addOfEveryKind(TestScene& scene, const char* name) {
     scene.add<Attribute>(name);
 }
 
-/// a (null), a/b (camera), a/b/c (light), a/d (no attribute), e (mesh), e/f (marker)
+void addOpticalMarker(TestScene& scene, const char* name) {
+    scene.add<fbxsdk::FbxMarker>(name)->GetMarker()->SetType(fbxsdk::FbxMarker::eOptical);
+}
+
+/// a (null), a/b (camera), a/b/c (light), a/d (no attribute), e (mesh), e/f (marker); and before d and f what is no
+/// object of any kind: a/skeleton and e/stereo.
 void buildTree(TestScene& scene) {
     fbxsdk::FbxNode* a = scene.add<fbxsdk::FbxNull>("a");
     fbxsdk::FbxNode* b = scene.add<fbxsdk::FbxCamera>("b", a);
     scene.add<fbxsdk::FbxLight>("c", b);
+    scene.add<fbxsdk::FbxSkeleton>("skeleton", a);
     scene.addNode("d", a);
     fbxsdk::FbxNode* e = addTriangle(scene, "e");
+    scene.add<fbxsdk::FbxCameraStereo>("stereo", e);
     scene.add<fbxsdk::FbxMarker>("f", e);
 }
 
@@ -66,7 +71,7 @@ TEST(NodeCounts, FollowTheMasksOfTheKinds) {
     EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(kNulls), 2);
     EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(kTransforms), 4);
     EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(0), 0);
-    EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(-1), 6);
+    EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(-1), 7); // the skeleton too, the stereo camera never
 
     EXPECT_EQ(scene.sdk.getNumberOfMeshes(), 1);
     EXPECT_EQ(scene.sdk.getNumberOfCameras(), 8);
@@ -83,6 +88,7 @@ TEST(NodeCounts, SelectEveryAttributeTypeByItsBit) {
     };
     const Row rows[] = {
         {0x1, addOfEveryKind<fbxsdk::FbxMarker>},
+        {0x1, addOpticalMarker}, // and not 0x100: its attribute is a marker's, like that of every type of marker
         {0x2, addOfEveryKind<fbxsdk::FbxSkeleton>},
         {0x4, addOfEveryKind<fbxsdk::FbxMesh>},
         {0x8, addOfEveryKind<fbxsdk::FbxNurbs>},
@@ -383,6 +389,21 @@ TEST(NamedLists, PassOverNodesOfAnotherKind) {
     EXPECT_EQ(light.getName(), "key");
 }
 
+TEST(NamedLists, FindNeitherSkeletonsNorStereoCameras) {
+    TestScene scene;
+    buildTree(scene);
+    TnFbxReadInfo skeletonInfo = test::readNamed("skeleton"), stereoInfo = test::readNamed("stereo");
+    Transform transform;
+    TnFbxCamera camera;
+
+    EXPECT_TRUE(scene.sdk.getTransforms(skeletonInfo, &transform, 1));
+    EXPECT_TRUE(scene.sdk.getTransforms(stereoInfo, &transform, 1));
+    EXPECT_TRUE(scene.sdk.getCameras(stereoInfo, &camera, 1));
+
+    EXPECT_EQ(transform.getName(), "");
+    EXPECT_EQ(camera.getName(), "");
+}
+
 TEST(NamedLists, ReadAProducerCamera) {
     TestScene scene;
     TnFbxCamera camera;
@@ -437,6 +458,23 @@ TEST(Lists, ReadInTheWorldOrLocallyAsTheOptionsSay) {
     info.setGlobalTransform(true);
     EXPECT_TRUE(scene.sdk.getTransforms(info, &transform, 1));
     EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformPositionX), 11.0f);
+}
+
+TEST(Lists, OfCamerasTurnThemToTheirInterestPositionAsTheOptionsSay) {
+    TestScene scene;
+    scene.add<fbxsdk::FbxCamera>("camera")->GetCamera()->InterestPosition.Set({9.0, 0.0, 0.0});
+    TnFbxReadInfo info = test::readNamed("camera");
+    for (const bool compute : {false, true}) {
+        info.setComputeCameraRotation(compute);
+        TnFbxCamera camera;
+
+        EXPECT_TRUE(scene.sdk.getCameras(info, &camera, 1));
+
+        EXPECT_EQ(camera.getName(), "camera");
+        EXPECT_EQ(camera.getValue(TnFbxCamera::kFbxCameraLookAtPositionX), compute ? 9.0f : 0.0f);
+        EXPECT_EQ(camera.getTransformRotationOrder(),
+                  compute ? Transform::kFbxRotationOrderZXY : Transform::kFbxRotationOrderXYZ);
+    }
 }
 
 TEST(Lists, WalkTreesThatAreDeeperThanTheStackOfCalls) {
@@ -498,6 +536,40 @@ TEST(Walkers, FailForAnIndexOutsideTheArray) {
         EXPECT_FALSE(scene.sdk.getNullsRecursive(time, false, false, 0.0f, true, "", top, index, &null, 1, found));
         EXPECT_EQ(index, start);
     }
+    EXPECT_EQ(null.getName(), "");
+}
+
+TEST(Walkers, FailForAnIndexOutsideTheArrayBeforeTheyCompareNames) {
+    TestScene scene;
+    buildTree(scene);
+    fbxsdk::FbxNode* top = scene.scene->GetRootNode()->GetChild(0);
+    TnFbxTime time = scene.time();
+    TnFbxNull null;
+    bool found = false;
+    for (const char* name : {"a", "another name"}) {
+        for (const int start : {-1, 1}) {
+            int index = start;
+            EXPECT_FALSE(
+                scene.sdk.getNullsRecursive(time, false, false, 0.0f, false, name, top, index, &null, 1, found));
+            EXPECT_EQ(index, start);
+        }
+    }
+    EXPECT_FALSE(found);
+    EXPECT_EQ(null.getName(), "");
+}
+
+TEST(Walkers, NeedNoRoomForNodesOfAnotherKind) {
+    TestScene scene;
+    fbxsdk::FbxNode* top = scene.add<fbxsdk::FbxLight>("light");
+    TnFbxTime time = scene.time();
+    TnFbxNull null;
+    bool found = false;
+    for (const bool allObjects : {false, true}) {
+        int index = 1;
+        EXPECT_TRUE(
+            scene.sdk.getNullsRecursive(time, false, false, 0.0f, allObjects, "light", top, index, &null, 1, found));
+    }
+    EXPECT_FALSE(found);
     EXPECT_EQ(null.getName(), "");
 }
 
@@ -585,66 +657,6 @@ TEST(ProducerIntoArray, FailsWithoutCameraArrayOrNode) {
     EXPECT_FALSE(scene.sdk.getProducerCamera(nowhere, info, nullptr, "name", index));
     EXPECT_FALSE(scene.sdk.getProducerCamera(nowhere, info, &camera, "name", index));
     EXPECT_EQ(index, 0);
-}
-
-// ---- The time that animation covers ----
-
-TEST(AnimationFrameRange, IsInSeconds) {
-    TestScene scene;
-    fbxsdk::FbxNode* node = scene.addNode("node");
-    scene.key(node->LclTranslation, "X", {{0, 0.0f}, {48, 1.0f}});
-    float start = -1.0f, end = -1.0f;
-
-    EXPECT_TRUE(scene.sdk.getAnimationFrameRange(start, end));
-
-    EXPECT_EQ(start, 0.0f);
-    EXPECT_EQ(end, 2.0f);
-}
-
-TEST(AnimationFrameRange, IsThatOfTheKeysNotOfTheStack) {
-    TestScene scene(0, 240);
-    fbxsdk::FbxNode* parent = scene.addNode("parent");
-    scene.key(parent->LclTranslation, "X", {{12, 0.0f}, {24, 1.0f}});
-    scene.key(scene.addNode("child", parent)->LclScaling, "Z", {{36, 0.0f}, {60, 1.0f}});
-    float start = -1.0f, end = -1.0f;
-
-    EXPECT_TRUE(scene.sdk.getAnimationFrameRange(start, end));
-
-    EXPECT_EQ(start, 0.5f);
-    EXPECT_EQ(end, 2.5f);
-}
-
-TEST(AnimationFrameRange, OfAStillSceneIsTheInvertedRangeOfAllFloats) {
-    TestScene scene;
-    buildTree(scene);
-    float start = 0.0f, end = 0.0f;
-
-    EXPECT_FALSE(scene.sdk.getAnimationFrameRange(start, end));
-
-    EXPECT_EQ(start, std::numeric_limits<float>::max());
-    EXPECT_EQ(end, -std::numeric_limits<float>::max());
-    EXPECT_FALSE(lastError().empty());
-}
-
-TEST(AnimationFrameRange, LeavesTheOutputsAloneWithoutARoot) {
-    FbxSdk sdk;
-    float start = 3.0f, end = 4.0f;
-
-    EXPECT_FALSE(sdk.getAnimationFrameRange(start, end));
-
-    EXPECT_EQ(start, 3.0f);
-    EXPECT_EQ(end, 4.0f);
-}
-
-TEST(AnimationFrameRange, FindsNoCachesBelowANullNodeOrAStillMesh) {
-    TestScene scene;
-    float start = 3.0f, end = 4.0f;
-
-    EXPECT_FALSE(scene.sdk.getAnimationFrameRangeRecursive(nullptr, start, end));
-    EXPECT_FALSE(scene.sdk.getAnimationFrameRangeRecursive(addTriangle(scene, "mesh"), start, end));
-
-    EXPECT_EQ(start, 3.0f);
-    EXPECT_EQ(end, 4.0f);
 }
 
 } // namespace

@@ -9,6 +9,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <iterator>
 #include <limits>
 #include <string>
 
@@ -21,6 +23,11 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using Names = std::vector<std::string>;
+
+constexpr int kMeshes = 0x4, kNurbs = 0x8, kPatches = 0x10;
+
+/// Row by row, as surfaces have their control points.
+const fbxsdk::FbxVector4 kUnitSquare[] = {{0.0, 0.0, 0.0}, {1.0, 0.0, 0.0}, {0.0, 1.0, 0.0}, {1.0, 1.0, 0.0}};
 
 std::string dataFile(const char* name) { return std::string(TARNELL_TEST_DATA "/sdk/") + name; }
 
@@ -46,6 +53,33 @@ void expectPosition(const TnFbxTransform& transform, float x, float y, float z) 
     EXPECT_FLOAT_EQ(transform.getTransformValue(TnFbxTransform::kFbxTransformPositionX), x);
     EXPECT_FLOAT_EQ(transform.getTransformValue(TnFbxTransform::kFbxTransformPositionY), y);
     EXPECT_FLOAT_EQ(transform.getTransformValue(TnFbxTransform::kFbxTransformPositionZ), z);
+}
+
+/// A flat patch of two by two control points on the unit square.
+fbxsdk::FbxNode* addPatch(TestScene& scene, const char* name, fbxsdk::FbxNode* parent) {
+    fbxsdk::FbxNode* node = scene.add<fbxsdk::FbxPatch>(name, parent);
+    fbxsdk::FbxPatch& patch = *fbxsdk::FbxCast<fbxsdk::FbxPatch>(node->GetNodeAttribute());
+    patch.InitControlPoints(2, fbxsdk::FbxPatch::eLinear, 2, fbxsdk::FbxPatch::eLinear);
+    for (int i = 0; i < 4; ++i) {
+        patch.SetControlPointAt(kUnitSquare[i], i);
+    }
+    return node;
+}
+
+/// The same square as a NURBS surface, of the newer of the two classes.
+fbxsdk::FbxNode* addNurbsSurface(TestScene& scene, const char* name) {
+    using Surface = fbxsdk::FbxNurbsSurface;
+    fbxsdk::FbxNode* node = scene.add<Surface>(name);
+    Surface& surface = *fbxsdk::FbxCast<Surface>(node->GetNodeAttribute());
+    surface.SetOrder(2, 2);
+    surface.InitControlPoints(2, Surface::eOpen, 2, Surface::eOpen);
+    const double knots[] = {0.0, 0.0, 1.0, 1.0};
+    std::copy(std::begin(knots), std::end(knots), surface.GetUKnotVector());
+    std::copy(std::begin(knots), std::end(knots), surface.GetVKnotVector());
+    for (int i = 0; i < 4; ++i) {
+        surface.SetControlPointAt(kUnitSquare[i], i);
+    }
+    return node;
 }
 
 void expectTime(const TnFbxTime& time, float frame, int startFrame, int endFrame, float rate) {
@@ -252,26 +286,68 @@ TEST(Loading, GivesAFileWithoutAStackOneWithALayer) {
     EXPECT_STREQ(stack->GetSrcObject<fbxsdk::FbxAnimLayer>(0)->GetName(), "Default Layer");
 }
 
-TEST(Loading, MakesMeshesOfNurbsAndPatchesOnlyWhenAsked) {
+TEST(Loading, MakesMeshesOfNurbsOnlyWhenAsked) {
     EXPECT_EQ(LoadedFile("nurbs_7400_ascii.fbx", /*convertGeometry*/ true).sdk.getNumberOfMeshes(), 1);
 
     LoadedFile asItIs("nurbs_7400_ascii.fbx", /*convertGeometry*/ false);
     EXPECT_EQ(asItIs.sdk.getNumberOfMeshes(), 0);
-    EXPECT_EQ(asItIs.sdk.getNumberOfNodeTypes(0x8), 1);
+    EXPECT_EQ(asItIs.sdk.getNumberOfNodeTypes(kNurbs), 1);
     EXPECT_TRUE(asItIs.sdk.convertNurbsAndPatch(asItIs.sdk.getScene()->GetFbxManager(), asItIs.sdk.getScene()));
     EXPECT_EQ(asItIs.sdk.getNumberOfMeshes(), 1);
 }
 
-TEST(NurbsConversion, LeavesEverythingElseAndNullAlone) {
+TEST(Loading, MakesMeshesOfPatchesOnlyWhenAsked) {
     TestScene scene;
-    fbxsdk::FbxNode* node = addTriangle(scene, "mesh");
-    const fbxsdk::FbxMesh* mesh = node->GetMesh();
+    addPatch(scene, "patch", scene.addNode("parent"));
+
+    EXPECT_TRUE(scene.sdk.loadScene(dataFile("nulls_7400_ascii.fbx"), /*convertGeometry*/ false)) << lastError();
+    EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(kPatches), 1);
+    EXPECT_EQ(scene.sdk.getNumberOfMeshes(), 0);
+
+    EXPECT_TRUE(scene.sdk.loadScene(dataFile("nulls_7400_ascii.fbx"), /*convertGeometry*/ true)) << lastError();
+    EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(kPatches), 0);
+    EXPECT_EQ(scene.sdk.getNumberOfMeshes(), 1);
+}
+
+TEST(NurbsConversion, MakesAMeshOfAPatchBelowAnotherNode) {
+    TestScene scene;
+    fbxsdk::FbxNode* parent = addTriangle(scene, "parent");
+    fbxsdk::FbxNode* node = addPatch(scene, "patch", parent);
+    ASSERT_EQ(scene.sdk.getNumberOfNodeTypes(kPatches), 1);
+    ASSERT_EQ(scene.sdk.getNumberOfNodeTypes(kMeshes), 1);
 
     EXPECT_TRUE(scene.sdk.convertNurbsAndPatch(scene.scene->GetFbxManager(), scene.scene));
+
+    EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(kPatches), 0);
+    EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(kMeshes), 2);
+    ASSERT_NE(node->GetMesh(), nullptr);
+    EXPECT_TRUE(node->GetMesh()->IsTriangleMesh());
+    EXPECT_GT(node->GetMesh()->GetPolygonCount(), 0);
+}
+
+TEST(NurbsConversion, LeavesMeshesAndNurbsSurfacesAsTheyAre) {
+    TestScene scene;
+    fbxsdk::FbxNode* quad = scene.add<fbxsdk::FbxMesh>("quad");
+    test::fillMesh(*quad->GetMesh(), {std::begin(kUnitSquare), std::end(kUnitSquare)}, {{0, 1, 3, 2}});
+    fbxsdk::FbxNode* surface = addNurbsSurface(scene, "surface");
+    fbxsdk::FbxNodeAttribute* attributes[] = {quad->GetNodeAttribute(), surface->GetNodeAttribute()};
+    for (fbxsdk::FbxNodeAttribute* attribute : attributes) {
+        fbxsdk::FbxGeometryConverter converter(scene.scene->GetFbxManager());
+        ASSERT_NE(converter.Triangulate(attribute, /*pReplace*/ false), nullptr) << "it could be made triangles";
+    }
+
+    EXPECT_TRUE(scene.sdk.convertNurbsAndPatch(scene.scene->GetFbxManager(), scene.scene));
+
+    EXPECT_EQ(quad->GetNodeAttribute(), attributes[0]);
+    EXPECT_EQ(quad->GetMesh()->GetPolygonSize(0), 4);
+    EXPECT_EQ(surface->GetNodeAttribute(), attributes[1]);
+}
+
+TEST(NurbsConversion, FindsNothingInNoSceneAndBelowNoNode) {
+    TestScene scene;
+
     EXPECT_TRUE(scene.sdk.convertNurbsAndPatch(scene.scene->GetFbxManager(), nullptr));
     EXPECT_TRUE(scene.sdk.convertNurbsAndPatchRecursive(scene.scene->GetFbxManager(), nullptr));
-
-    EXPECT_EQ(node->GetMesh(), mesh);
 }
 
 // ---- Animation stacks ----
@@ -376,6 +452,20 @@ TEST(StackTime, IsConvertedInSinglePrecisionAndTruncated) {
     scene.setSpan(-7, -1);
     EXPECT_TRUE(scene.sdk.getGlobalAnimationStackTime(time, 0.0f, true, 25.0f));
     expectTime(time, 0.0f, -7, -1, 25.0f);
+}
+
+TEST(StackTime, IsDividedByTheRateOfTheSceneBeforeItIsMultiplied) {
+    TestScene scene;
+    fbxsdk::FbxTime first, last;
+    first.SetFrame(63, fbxsdk::FbxTime::eFrames30);
+    last.SetFrame(123, fbxsdk::FbxTime::eFrames30);
+    scene.scene->GetGlobalSettings().SetTimeMode(fbxsdk::FbxTime::eFrames30);
+    scene.stack->SetLocalTimeSpan(fbxsdk::FbxTimeSpan(first, last));
+    TnFbxTime time;
+
+    EXPECT_TRUE(scene.sdk.getGlobalAnimationStackTime(time, 0.0f, true, 60.0f));
+
+    expectTime(time, 0.0f, 125, 246, 60.0f);
 }
 
 TEST(StackTime, SurvivesASpanOfAllTimes) {

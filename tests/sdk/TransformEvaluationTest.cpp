@@ -198,13 +198,14 @@ TEST(ExtractMatrixRotation, HasAToleranceOfAHundredThousandth) {
 
 TEST(ExtractMatrixRotation, MultipliesByAVanishingLength) {
     FbxAMatrix matrix; // an axis of no length: h is 0 and its own factor
+    matrix[0] = fbxsdk::FbxDouble4(1.0, 1.0, 0.0, 0.0);
     matrix[2] = fbxsdk::FbxDouble4(0.0, 0.5, 0.0, 0.0);
 
     const Angles angles = extract(matrix);
 
     EXPECT_EQ(angles.x, -90.0f); // atan2(−0.5, 0)
     EXPECT_EQ(angles.y, 0.0f);   // atan2(0, 0)
-    EXPECT_EQ(angles.z, 0.0f);
+    EXPECT_EQ(angles.z, 0.0f);   // atan2(1 · 0, 1 · 0), where 1 and 1 alone would give 45
 }
 
 TEST(ExtractMatrixRotation, SurvivesNumbersThatAreNone) {
@@ -384,14 +385,51 @@ TEST(GlobalTransform, DecomposesDifferentlyAtTheOriginAndBesideIt) {
     node->LclRotation.Set({90.0, 40.0, 0.0});
 
     const Transform atOrigin = readTransform(scene, node, true, scene.time());
-    node->LclTranslation.Set({1e-9, 0.0, 0.0});
-    const Transform beside = readTransform(scene, node, true, scene.time());
-
     float x = 0.0f, y = 0.0f, z = 0.0f;
     scene.sdk.extractMatrixRotation(rotation(90.0, 40.0, 0.0), x, y, z);
     expectStatic(atOrigin, kRotationX, x, y, z, kDegreesTolerance);
-    expectStatic(beside, kRotationX, 90.0f, 40.0f, 0.0f, kDegreesTolerance);
-    EXPECT_NE(atOrigin.getTransformValue(after(kRotationX, 1)), beside.getTransformValue(after(kRotationX, 1)));
+
+    for (int axis = 0; axis < 3; ++axis) {
+        SCOPED_TRACE(axis);
+        fbxsdk::FbxDouble3 step;
+        step[axis] = 1e-9;
+        node->LclTranslation.Set(step);
+        const Transform beside = readTransform(scene, node, true, scene.time());
+        expectStatic(beside, kRotationX, 90.0f, 40.0f, 0.0f, kDegreesTolerance);
+        EXPECT_NE(atOrigin.getTransformValue(after(kRotationX, 1)), beside.getTransformValue(after(kRotationX, 1)));
+    }
+}
+
+TEST(GlobalTransform, DecomposesBesideTheOriginWhatAGeometricTranslationMovesThere) {
+    TestScene scene(0, 0);
+    fbxsdk::FbxNode* node = scene.addNode("node");
+    node->LclRotation.Set({90.0, 40.0, 0.0});
+    FbxAMatrix geometric;
+    geometric.SetT(FbxVector4(0.0, 0.0, 1e-9));
+
+    const GlobalValues atOrigin = globalValues(scene, node, timeRecord(0, 0));
+    const GlobalValues moved = globalValues(scene, node, timeRecord(0, 0), geometric);
+
+    EXPECT_NEAR(moved.values[3].at(0), 90.0f, kDegreesTolerance);
+    EXPECT_NEAR(moved.values[4].at(0), 40.0f, kDegreesTolerance);
+    EXPECT_NEAR(moved.values[5].at(0), 0.0f, kDegreesTolerance);
+    EXPECT_GT(std::fabs(atOrigin.values[4].at(0) - moved.values[4].at(0)), 1.0f);
+}
+
+TEST(GlobalTransform, DecomposesAtTheOriginWhatAGeometricTranslationMovesThere) {
+    TestScene scene(0, 0);
+    fbxsdk::FbxNode* node = scene.addNode("node");
+    node->LclTranslation.Set({5.0, 0.0, 0.0});
+    FbxAMatrix geometric;
+    geometric.SetTRS(FbxVector4(-5.0, 0.0, 0.0), FbxVector4(90.0, 40.0, 0.0), FbxVector4(1.0, 1.0, 1.0));
+
+    const GlobalValues all = globalValues(scene, node, timeRecord(0, 0), geometric);
+
+    const Angles expected = extract(rotation(90.0, 40.0, 0.0));
+    EXPECT_EQ(all.values[0].at(0), 0.0f);
+    EXPECT_NEAR(all.values[3].at(0), expected.x, kDegreesTolerance);
+    EXPECT_NEAR(all.values[4].at(0), expected.y, kDegreesTolerance);
+    EXPECT_NEAR(all.values[5].at(0), expected.z, kDegreesTolerance);
 }
 
 TEST(GlobalTransform, TurnsAtTheOriginByNinetyDegreesAboutX) {
