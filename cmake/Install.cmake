@@ -10,7 +10,12 @@ if(NOT TARNELL_FBXSDK_ROOT)
 endif()
 
 install(DIRECTORY include/ DESTINATION "${CMAKE_INSTALL_INCLUDEDIR}/tarnell-fbx" FILES_MATCHING PATTERN "*.h")
-if(NOT TARNELL_FBXSDK_ROOT)
+if(TARNELL_FBXSDK_ROOT)
+  # Hosts find the external SDK themselves: no package of ours can say where it is.
+  install(TARGETS tarnell-fbx)
+else()
+  set(pkgconfig_platform_libraries " -ltarnell-fbxsdk")
+  set(pkgconfig_platform_includes " -I\${includedir}/platform")
   install(DIRECTORY fbxsdk/include/ DESTINATION "${CMAKE_INSTALL_INCLUDEDIR}/tarnell-fbx/platform"
     FILES_MATCHING PATTERN "*.h")
   install(TARGETS tarnell-fbx tarnell-fbxsdk EXPORT TarnellFbxTargets)

@@ -34,9 +34,13 @@ function(tarnell_precompile_test_headers name)
 endfunction()
 
 # tarnell_test(NAME FOLDER folder LINK target...): every *Test.cpp of the folder becomes one executable.
+# tarnell_test(NAME SOURCES file... LINK target...): these files do.
 function(tarnell_test name)
-  cmake_parse_arguments(ARG "" "FOLDER" "LINK" ${ARGN})
-  file(GLOB sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/${ARG_FOLDER}/*Test.cpp")
+  cmake_parse_arguments(ARG "" "FOLDER" "LINK;SOURCES" ${ARGN})
+  set(sources ${ARG_SOURCES})
+  if(ARG_FOLDER)
+    file(GLOB sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/${ARG_FOLDER}/*Test.cpp")
+  endif()
   if(NOT sources)
     return()
   endif()

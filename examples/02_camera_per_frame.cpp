@@ -6,27 +6,13 @@
 #include <cstdio>
 #include <memory>
 
+#include "CameraLines.h"
 #include "Fbx.h"
 #include "TnFbxCamera.h"
 #include "TnFbxError.h"
 #include "TnFbxReadInfo.h"
 
 using namespace Tarnell::Fbx;
-
-namespace {
-
-void printFrame(const TnFbxCamera& camera, int frame) {
-    const auto at = [&](TnFbxTransform::EFbxTransformChannelType channel) {
-        return static_cast<double>(camera.getTransformValueAt(channel, static_cast<float>(frame)));
-    };
-    std::printf("%5d  position %9.3f %9.3f %9.3f  rotation %8.3f %8.3f %8.3f  focal length %7.3f\n", frame,
-                at(TnFbxTransform::kFbxTransformPositionX), at(TnFbxTransform::kFbxTransformPositionY),
-                at(TnFbxTransform::kFbxTransformPositionZ), at(TnFbxTransform::kFbxTransformRotationX),
-                at(TnFbxTransform::kFbxTransformRotationY), at(TnFbxTransform::kFbxTransformRotationZ),
-                static_cast<double>(camera.getValueAt(TnFbxCamera::kFbxCameraFocalLength, static_cast<float>(frame))));
-}
-
-} // namespace
 
 int main(int argc, char** argv) {
     if (argc != 3) {
@@ -47,8 +33,6 @@ int main(int argc, char** argv) {
         std::fprintf(stderr, "%s\n", read ? "no camera of that name" : lastError().c_str());
         return 1;
     }
-    const TnFbxTime time = cameras[0].getTransformTime(TnFbxTransform::kFbxTransformPositionX);
-    for (int frame = time.getStartFrame(); frame <= time.getEndFrame(); ++frame)
-        printFrame(cameras[0], frame);
+    printCamera(cameras[0]);
     return 0;
 }

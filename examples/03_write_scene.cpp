@@ -3,12 +3,14 @@
 //
 // Builds a shot from nothing and writes it: a camera that moves and zooms, a spot light, two nulls and a waving sheet
 // whose points go into a point cache beside the file. What a tracking or layout program would hand to the next one.
+#include <algorithm>
 #include <cmath>
 #include <cstdio>
 #include <functional>
 #include <string>
 #include <vector>
 
+#include "CameraLines.h"
 #include "Fbx.h"
 #include "TnFbxCamera.h"
 #include "TnFbxError.h"
@@ -117,9 +119,13 @@ TnFbxMesh makeSheet() {
 
 int main(int argc, char** argv) {
     if (argc < 2) {
-        std::fprintf(stderr, "usage: %s FILE.fbx [--ascii]\n", argv[0]);
+        std::fprintf(stderr, "usage: %s FILE.fbx [--ascii] [--values]\n", argv[0]);
         return 2;
     }
+    const std::vector<std::string> options(argv + 2, argv + argc);
+    const auto isGiven = [&](const char* option) {
+        return std::find(options.begin(), options.end(), option) != options.end();
+    };
     TnFbxCamera camera = makeCamera();
     TnFbxLight light = makeSpot();
     TnFbxNull left = makeNull("left", -120.0F), right = makeNull("right", 120.0F);
@@ -128,7 +134,7 @@ int main(int argc, char** argv) {
     TnFbxWriteInfo info;
     info.setFileName(argv[1]);
     info.setAnimationStackName("Take 001");
-    info.setFileFormat(argc > 2 && std::string(argv[2]) == "--ascii");
+    info.setFileFormat(isGiven("--ascii"));
     info.setFPS(kFramesPerSecond);
     info.setStartFrame(static_cast<float>(kFirst)); // of the point cache
     info.setEndFrame(static_cast<float>(kLast));
@@ -136,6 +142,9 @@ int main(int argc, char** argv) {
         std::fprintf(stderr, "%s\n", lastError().c_str());
         return 1;
     }
-    std::printf("wrote %s\n", argv[1]);
+    if (isGiven("--values"))
+        printCamera(camera); // what went in, to be held against what is read
+    else
+        std::printf("wrote %s\n", argv[1]);
     return 0;
 }

@@ -25,13 +25,13 @@ BACKWARD = ["positions", "axes"]
 PEERS = {
     "assimp": {
         "opens": lambda entry: entry["version"] >= 7100,
-        "reports": {"camera": ["positions"], "light": ["positions", "type", "radiance"], "null": ["positions"],
-                    "mesh": ["points", "polygons"]},
+        "reports": {"camera": ["positions"], "light": ["positions", "type", "radiance", "coneAngle"],
+                    "null": ["positions"], "mesh": ["points", "polygons"]},
     },
     "blender": {
         "opens": lambda entry: entry["version"] >= 7100 and not entry["ascii"],
         "reports": {"camera": BACKWARD + ["focalLengths", "filmWidth", "filmHeight", "filmOffset"],
-                    "light": BACKWARD + ["type", "colour"], "null": ANIMATED,
+                    "light": BACKWARD + ["type", "colour", "coneAngle"], "null": ANIMATED,
                     "mesh": ["points", "polygons", "polygonVertices", "uvs"]},
         "caches": ["cached"],
     },
