@@ -105,8 +105,24 @@ void printTable(const Results& results) {
     }
 }
 
+/// Every differing file of every row, with the reason.
+void printReasons(const Results& results, const Expectations& expectations) {
+    for (const Row& row : rows()) {
+        const auto found = results.find(row.name);
+        if (found == results.end() || found->second.differingFiles.empty())
+            continue;
+        std::printf("\n%s differs in\n", row.name);
+        for (const std::string& file : found->second.differingFiles) {
+            const std::string reason = expectations.reasonOf(row.name, file);
+            std::printf("  %-48s %s\n", file.c_str(), reason.empty() ? "(no reason is known)" : reason.c_str());
+        }
+    }
+    std::puts("");
+}
+
 int judge(const Options& options, const Results& results) {
     Expectations expectations(TARNELL_CONFORMANCE_EXPECTED);
+    printReasons(results, expectations);
     if (options.update) {
         expectations.update(results);
         expectations.write();

@@ -65,6 +65,14 @@ std::vector<std::string> Expectations::violations(const Results& results) const 
     return violations;
 }
 
+std::string Expectations::reasonOf(const std::string& row, const std::string& file) const {
+    const auto expected = mRows.find(row);
+    if (expected == mRows.end())
+        return {};
+    const auto reason = expected->second.reasons.find(file);
+    return reason != expected->second.reasons.end() ? reason->second : std::string();
+}
+
 void Expectations::update(const Results& results) {
     for (const auto& [name, result] : results) {
         ExpectedRow& row = mRows[name];

@@ -35,6 +35,8 @@ public:
 
     /// A sentence for everything that is worse than expected, or better without being written down.
     [[nodiscard]] std::vector<std::string> violations(const Results& results) const;
+    /// Why a file differs in a row; empty when no reason is written down.
+    [[nodiscard]] std::string reasonOf(const std::string& row, const std::string& file) const;
     /// Takes the numbers over. Files that agree now are dropped, new ones come in without a reason, which violates.
     void update(const Results& results);
     void write() const;

@@ -51,6 +51,12 @@ TEST_F(ExpectationsTest, RejectsAListedFileThatAgrees) {
     EXPECT_THAT(expectations.violations(resultOf(10, 10, {})), ElementsAre(HasSubstr("cube agrees now")));
 }
 
+TEST_F(ExpectationsTest, KnowsTheReasonOfAListedFile) {
+    EXPECT_EQ(expectations.reasonOf("nodes", "cube"), "kept on purpose");
+    EXPECT_EQ(expectations.reasonOf("nodes", "cone"), "");
+    EXPECT_EQ(expectations.reasonOf("curves", "cube"), "");
+}
+
 TEST_F(ExpectationsTest, RejectsARowWithoutExpectations) {
     const Results results = {{"curves", {3, 2, 1, {"cone"}}}};
 

@@ -51,25 +51,8 @@ TEST(CameraWriting, SetsFilmAndPlanes) {
     EXPECT_EQ(scene.target->FarPlane.Get(), 12.0);
 }
 
-TEST(CameraWriting, KeysNeitherFilmNorPlanesBecauseTheyCannotBeAnimated) {
+TEST(CameraWriting, KeysFilmAndPlanes) {
     CameraScene scene;
-
-    EXPECT_TRUE(scene.write());
-
-    EXPECT_EQ(scene.curve(scene.target->FilmWidth), nullptr);
-    EXPECT_EQ(scene.curve(scene.target->FilmHeight), nullptr);
-    EXPECT_EQ(scene.curve(scene.target->NearPlane), nullptr);
-    EXPECT_EQ(scene.curve(scene.target->FarPlane), nullptr);
-}
-
-TEST(CameraWriting, KeysFilmAndPlanesWhereTheyCanBeAnimated) {
-    CameraScene scene;
-    for (fbxsdk::FbxProperty property :
-         {fbxsdk::FbxProperty(scene.target->FilmWidth), //
-          fbxsdk::FbxProperty(scene.target->FilmHeight), fbxsdk::FbxProperty(scene.target->NearPlane),
-          fbxsdk::FbxProperty(scene.target->FarPlane)}) {
-        property.ModifyFlag(fbxsdk::FbxPropertyFlags::eAnimatable, true);
-    }
 
     EXPECT_TRUE(scene.write());
 

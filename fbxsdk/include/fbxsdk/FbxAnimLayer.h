@@ -28,8 +28,8 @@ public:
     void SetBlendModeBypass(EFbxType pType, bool pState);
     [[nodiscard]] bool GetBlendModeBypass(EFbxType pType) const;
 
-    /// The layer's curve node for the property, made when there is none; null for an invalid property, one that holds
-    /// no number, and one that is not animatable.
+    /// The layer's curve node for the property, made when there is none, also when the property is not marked as
+    /// animatable; null for an invalid property and one that holds no number.
     FbxAnimCurveNode* CreateCurveNode(FbxProperty& pProperty);
 };
 

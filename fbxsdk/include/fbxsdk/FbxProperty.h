@@ -122,7 +122,7 @@ public:
 
     /// The curve of one component on one layer. With pCreate a missing curve node and curve are made; null for a null
     /// layer, an unknown component, a name that is not the property's, and where one would have to be made for a
-    /// property that is not animatable.
+    /// property that holds no number.
     FbxAnimCurve* GetCurve(FbxAnimLayer* pAnimLayer, bool pCreate = false);
     FbxAnimCurve* GetCurve(FbxAnimLayer* pAnimLayer, const char* pChannel, bool pCreate = false);
     FbxAnimCurve* GetCurve(FbxAnimLayer* pAnimLayer, const char* pName, const char* pChannel, bool pCreate);

@@ -56,8 +56,7 @@ bool FbxAnimLayer::GetBlendModeBypass(EFbxType pType) const {
 FbxAnimCurveNode* FbxAnimLayer::CreateCurveNode(FbxProperty& pProperty) {
     if (FbxAnimCurveNode* existing = pProperty.GetCurveNode(this, false))
         return existing;
-    if (!pProperty.GetFlag(FbxPropertyFlags::eAnimatable))
-        return nullptr;
+    // What a host keys is kept, whatever the flags say: films and planes of cameras are not marked as animatable.
     FbxAnimCurveNode* node = FbxAnimCurveNode::CreateTypedCurveNode(pProperty, GetScene());
     if (!node)
         return nullptr;

@@ -264,19 +264,19 @@ TEST_F(FbxAnimCurveNodeTest, GivesTheChannelsOfColoursByComponent) {
     EXPECT_NE(fileGreen, nullptr);
 }
 
-TEST_F(FbxAnimCurveNodeTest, IsNotMadeForAPropertyThatIsNotAnimatable) {
-    FbxProperty still = FbxProperty::Create(node, FbxDoubleDT, "still");
+TEST_F(FbxAnimCurveNodeTest, IsMadeForNumbersWhetherOrNotTheyAreMarkedAsAnimatable) {
+    FbxProperty number = FbxProperty::Create(node, FbxDoubleDT, "number");
+    FbxProperty text = FbxProperty::Create(node, FbxStringDT, "text");
     FbxCamera* camera = FbxCamera::Create(scene, "camera");
+    ASSERT_FALSE(number.GetFlag(FbxPropertyFlags::eAnimatable));
+    ASSERT_FALSE(camera->FilmWidth.GetFlag(FbxPropertyFlags::eAnimatable));
 
-    EXPECT_EQ(still.GetCurve(layer, true), nullptr);
-    EXPECT_EQ(still.CreateCurveNode(layer), nullptr);
-    EXPECT_EQ(camera->FilmWidth.GetCurve(layer, "FilmWidth", nullptr, true), nullptr);
-    EXPECT_EQ(camera->NearPlane.GetCurve(layer, true), nullptr);
-    EXPECT_NE(camera->FocalLength.GetCurve(layer, true), nullptr);
-    EXPECT_EQ(layer->GetMemberCount<FbxAnimCurveNode>(), 1);
-
-    still.ModifyFlag(FbxPropertyFlags::eAnimatable, true);
-    EXPECT_NE(still.GetCurve(layer, true), nullptr);
+    EXPECT_NE(number.GetCurve(layer, true), nullptr);
+    EXPECT_NE(number.CreateCurveNode(layer), nullptr);
+    EXPECT_NE(camera->FilmWidth.GetCurve(layer, "FilmWidth", nullptr, true), nullptr);
+    EXPECT_EQ(text.GetCurve(layer, true), nullptr);
+    EXPECT_EQ(text.CreateCurveNode(layer), nullptr);
+    EXPECT_EQ(layer->GetMemberCount<FbxAnimCurveNode>(), 2);
 }
 
 TEST_F(FbxAnimCurveNodeTest, StartsChannelsAtThePropertysValue) {

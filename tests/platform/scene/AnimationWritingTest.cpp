@@ -237,6 +237,24 @@ TEST_P(AnimationWriting, KeepsKeysOfAttributesAndMaterials) {
     expectSameCurve(green, backMaterial->Diffuse.GetCurve(layerOf(copy), "Y"));
 }
 
+TEST_P(AnimationWriting, KeepsKeysOfTheFilmAndThePlanesOfACamera) {
+    FbxCamera* camera = make<FbxCamera>("camera");
+    addNode("node", camera);
+    FbxAnimCurve* width = keys(camera->FilmWidth, layer, nullptr, {{0, 1}, {1, 1.5}});
+    FbxAnimCurve* height = keys(camera->FilmHeight, layer, nullptr, {{0, 0.5}, {2, 0.75}});
+    FbxAnimCurve* nearPlane = keys(camera->NearPlane, layer, nullptr, {{0, 10}, {1, 20}});
+    FbxAnimCurve* farPlane = keys(camera->FarPlane, layer, nullptr, {{0, 1000}, {3, 4000}});
+
+    FbxScene* copy = writeAndRead();
+
+    auto* back = FbxCast<FbxCamera>(nodeOf(copy)->GetNodeAttribute());
+    ASSERT_NE(back, nullptr);
+    expectSameCurve(width, back->FilmWidth.GetCurve(layerOf(copy)));
+    expectSameCurve(height, back->FilmHeight.GetCurve(layerOf(copy)));
+    expectSameCurve(nearPlane, back->NearPlane.GetCurve(layerOf(copy)));
+    expectSameCurve(farPlane, back->FarPlane.GetCurve(layerOf(copy)));
+}
+
 TEST_P(AnimationWriting, KeepsKeysOfALightUnderItsOldNames) {
     FbxLight* light = make<FbxLight>("light");
     addNode("node", light);
