@@ -20,14 +20,16 @@
 #include <fbxsdk.h>
 
 #include <cstdint>
+#include <memory>
 #include <string>
 #include <vector>
 
 namespace Tarnell::Fbx {
 
 namespace detail {
+class FrameTimes;
 class PropertySampler;
-}
+} // namespace detail
 
 /// One scene, and what can be read from it or written into it.
 ///
@@ -381,6 +383,7 @@ private:
     fbxsdk::FbxAnimStack* mCurrentAnimStack = nullptr;
     std::int64_t mSamplesLeft;        // of a list's share; without an end outside of lists
     std::int64_t mSamplesOfFiles = 0; // that a list may hold; 0: no file was loaded
+    std::unique_ptr<detail::FrameTimes> mFrameTimes;
 };
 
 } // namespace Tarnell::Fbx

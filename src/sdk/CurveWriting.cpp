@@ -17,12 +17,9 @@ using detail::succeed;
 
 namespace {
 
-/// Beyond, times are worked out one by one: a range may say more frames than there is memory for.
-constexpr std::size_t kMostKeptTimes = std::size_t{1} << 20;
-
-void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float scale, detail::KeyTimes& times) {
+void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float scale, detail::FrameTimes& times) {
     const TnFbxTime range = channel.getTime();
-    times.begin(range);
+    times.begin(range.getStartFrame(), range.getFrameRate());
     // wider than a frame, so that the count can pass the last int
     for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
         const float value = channel.getAnimatedValue(static_cast<float>(frame));
@@ -54,29 +51,7 @@ fbxsdk::FbxDouble3 staticValues(const TnFbxTransform& transform, TnFbxTransform:
 
 } // namespace
 
-void detail::KeyTimes::begin(const TnFbxTime& range) {
-    const auto rate = static_cast<double>(range.getFrameRate());
-    if (mFirstFrame != range.getStartFrame() || mRate != rate) {
-        mTimes.clear();
-    }
-    mFirstFrame = range.getStartFrame();
-    mRate = rate;
-}
-
-fbxsdk::FbxTime detail::KeyTimes::at(std::int64_t frame) {
-    const auto index = static_cast<std::size_t>(frame - mFirstFrame);
-    if (index < mTimes.size()) {
-        return mTimes[index];
-    }
-    fbxsdk::FbxTime time;
-    time.SetSecondDouble(static_cast<double>(frame) / mRate);
-    if (index < kMostKeptTimes) {
-        mTimes.push_back(time);
-    }
-    return time;
-}
-
-bool detail::writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel, float scale, KeyTimes& times) {
+bool detail::writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel, float scale, FrameTimes& times) {
     if (curve == nullptr || channel == nullptr) {
         return fail("no curve or no channel to write");
     }
@@ -90,8 +65,7 @@ bool detail::writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel
 }
 
 bool FbxSdk::setCurveValues(fbxsdk::FbxAnimCurve* curve, TnFbxChannel* channel, float scale) const {
-    detail::KeyTimes times;
-    return detail::writeCurve(curve, channel, scale, times);
+    return detail::writeCurve(curve, channel, scale, *mFrameTimes);
 }
 
 /// The layer that is written to; null without a stack or layer.
@@ -107,7 +81,7 @@ bool FbxSdk::setTransformCurveValues(fbxsdk::FbxNode* node, TnFbxTransform* tran
     for (const LocalRow& row : kLocalRows) {
         (node->*row.property).Set(staticValues(*transform, row.firstChannel));
     }
-    ChannelWriter writer(currentLayer());
+    ChannelWriter writer(currentLayer(), *mFrameTimes);
     for (const LocalRow& row : kLocalRows) {
         for (int i = 0; i < 3; ++i) {
             TnFbxChannel* channel = transform->getTransformChannel(channelAfter(row.firstChannel, i));

@@ -6,35 +6,21 @@
 
 #include "FbxSdk.h"
 
-#include <cstdint>
-#include <vector>
+#include "FrameTimes.h"
 
 namespace Tarnell::Fbx::detail {
 
-/// The moments of a channel's frames. Most channels of an object have the same ones: they are worked out once.
-class KeyTimes {
-public:
-    void begin(const TnFbxTime& range);
-    /// Frames are asked for in order, from the first one of the range on.
-    fbxsdk::FbxTime at(std::int64_t frame);
-
-private:
-    std::int64_t mFirstFrame = 0;
-    double mRate = 0.0;
-    std::vector<fbxsdk::FbxTime> mTimes; // of the first frames
-};
-
 /// The channel's static value, and a linear key for every frame of its range. False without a curve or channel.
-bool writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel, float scale, KeyTimes& times);
+bool writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel, float scale, FrameTimes& times);
 
 /// Writes channels into properties, with their keys on one layer.
 class ChannelWriter {
 public:
     /// Without a layer only static values are written.
-    explicit ChannelWriter(fbxsdk::FbxAnimLayer* layer) : mLayer(layer) {}
+    ChannelWriter(fbxsdk::FbxAnimLayer* layer, FrameTimes& times) : mLayer(layer), mTimes(times) {}
 
-    /// The curve of one component of a property, or of a scalar property when `component` is null. A property that
-    /// cannot be animated has none.
+    /// The curve of one component of a property, or of a scalar property when `component` is null. A property
+    /// that holds no number has none.
     void key(fbxsdk::FbxProperty property, const char* component, TnFbxChannel* channel, float scale = 1.0f) {
         if (fbxsdk::FbxAnimCurve* curve = property.GetCurve(mLayer, property.GetName(), component, true)) {
             writeCurve(curve, channel, scale, mTimes);
@@ -51,7 +37,7 @@ public:
 
 private:
     fbxsdk::FbxAnimLayer* mLayer;
-    KeyTimes mTimes;
+    FrameTimes& mTimes;
 };
 
 } // namespace Tarnell::Fbx::detail

@@ -13,13 +13,6 @@ namespace Tarnell::Fbx {
 
 using detail::PropertySampler;
 
-namespace {
-
-/// Later ones are worked out for each channel: there may be more frames than memory.
-constexpr std::int64_t kMostKeptMoments = std::int64_t{1} << 16;
-
-} // namespace
-
 void detail::useTimeModeOf(const fbxsdk::FbxScene* scene) {
     if (scene != nullptr) {
         const fbxsdk::FbxGlobalSettings& settings = scene->GetGlobalSettings();
@@ -43,11 +36,13 @@ std::vector<fbxsdk::FbxAnimLayer*> detail::layersOf(fbxsdk::FbxAnimStack* stack)
 }
 
 PropertySampler::PropertySampler(fbxsdk::FbxScene* scene, fbxsdk::FbxAnimStack* stack, const TnFbxTime& requested,
-                                 bool useSampleRate, float sampleRate, std::int64_t& samplesLeft)
+                                 bool useSampleRate, float sampleRate, std::int64_t& samplesLeft,
+                                 FrameTimes& frameTimes)
     : mLayers(layersOf(stack)),
       mTimeMode(scene != nullptr ? scene->GetGlobalSettings().GetTimeMode() : fbxsdk::FbxTime::eDefaultMode),
       mRate(toFloat(fbxsdk::FbxTime::GetFrameRate(mTimeMode))), mRequested(requested),
-      mConvert(useSampleRate && sampleRate > 0.0f), mSampleRate(sampleRate), mSamplesLeft(samplesLeft) {}
+      mConvert(useSampleRate && sampleRate > 0.0f), mSampleRate(sampleRate), mSamplesLeft(samplesLeft),
+      mFrameTimes(frameTimes) {}
 
 void PropertySampler::collectCurves(const fbxsdk::FbxProperty& property, const char* component) {
     mCurves.clear();
@@ -78,26 +73,6 @@ detail::SampleRange PropertySampler::keyedRange() const {
     return range;
 }
 
-// kept: seconds are counted at the scene's rate also when the frames were converted to another one
-fbxsdk::FbxTime PropertySampler::momentOf(std::int64_t frame) const {
-    fbxsdk::FbxTime moment;
-    moment.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(mRate));
-    return moment;
-}
-
-void PropertySampler::setMoments(std::int64_t first, std::int64_t count) {
-    count = std::min(count, kMostKeptMoments);
-    if (mFirstFrame == first && static_cast<std::int64_t>(mMoments.size()) == count) {
-        return;
-    }
-    mMoments.clear();
-    mMoments.reserve(static_cast<std::size_t>(count));
-    mFirstFrame = first;
-    for (std::int64_t i = 0; i < count; ++i) {
-        mMoments.push_back(momentOf(first + i));
-    }
-}
-
 float PropertySampler::valueAt(const fbxsdk::FbxTime& moment) {
     float value = 0.0f;
     for (auto& [curve, lastKey] : mCurves) {
@@ -120,13 +95,10 @@ bool PropertySampler::sample(const fbxsdk::FbxProperty& property, const char* co
         if (!takeSamples(mSamplesLeft, count, /*channelCount*/ 1)) {
             return false;
         }
-        setMoments(range.first, count);
+        mFrameTimes.begin(range.first, mRate); // kept: the scene's rate, also of frames converted to another one
         mSamples.reserve(static_cast<std::size_t>(count));
-        for (const fbxsdk::FbxTime& moment : mMoments) {
-            mSamples.push_back(valueAt(moment));
-        }
-        for (auto i = static_cast<std::int64_t>(mMoments.size()); i < count; ++i) {
-            mSamples.push_back(valueAt(momentOf(range.first + i)));
+        for (std::int64_t i = 0; i < count; ++i) {
+            mSamples.push_back(valueAt(mFrameTimes.at(range.first + i)));
         }
     }
     mTime = sampledTime(range, mRate);
@@ -148,7 +120,7 @@ void PropertySampler::readIntoTransform(TnFbxTransform& transform,
 
 detail::PropertySampler FbxSdk::sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS) {
     detail::useTimeModeOf(mScene);
-    return PropertySampler(mScene, mCurrentAnimStack, time, useSampleFPS, sampleFPS, mSamplesLeft);
+    return PropertySampler(mScene, mCurrentAnimStack, time, useSampleFPS, sampleFPS, mSamplesLeft, *mFrameTimes);
 }
 
 } // namespace Tarnell::Fbx

@@ -7,6 +7,7 @@
 // time mode, rate) and keeps its buffers from one property to the next.
 #pragma once
 
+#include "FrameTimes.h"
 #include "SampleRange.h"
 
 #include "TnFbxTime.h"
@@ -44,9 +45,9 @@ inline constexpr const char* kComponents[] = {"X", "Y", "Z"};
 class PropertySampler {
 public:
     /// `requested` is the range to cover at least. Key frames are converted to `sampleRate` when `useSampleRate` is set
-    /// and the rate above 0. `samplesLeft` is shared by all samplers of a list.
+    /// and the rate above 0. `samplesLeft` is shared by all samplers of a list, `frameTimes` by any.
     PropertySampler(fbxsdk::FbxScene* scene, fbxsdk::FbxAnimStack* stack, const TnFbxTime& requested,
-                    bool useSampleRate, float sampleRate, std::int64_t& samplesLeft);
+                    bool useSampleRate, float sampleRate, std::int64_t& samplesLeft, FrameTimes& frameTimes);
 
     /// Samples one component of a property, or a scalar property when `component` is null; `time` and `samples` hold
     /// the result until the next call.
@@ -89,8 +90,6 @@ public:
 private:
     void collectCurves(const fbxsdk::FbxProperty& property, const char* component);
     SampleRange keyedRange() const;
-    void setMoments(std::int64_t first, std::int64_t count);
-    fbxsdk::FbxTime momentOf(std::int64_t frame) const;
     float valueAt(const fbxsdk::FbxTime& moment);
 
     std::vector<fbxsdk::FbxAnimLayer*> mLayers;
@@ -100,6 +99,7 @@ private:
     bool mConvert;
     float mSampleRate;
     std::int64_t& mSamplesLeft;
+    FrameTimes& mFrameTimes;
 
     /// A curve, and where it was evaluated last: the next sample is not far.
     struct SampledCurve {
@@ -107,9 +107,7 @@ private:
         int lastKey;
     };
 
-    std::vector<SampledCurve> mCurves;     // of the component being sampled, with and without keys
-    std::vector<fbxsdk::FbxTime> mMoments; // of the first frames; all curves of a read mostly have the same
-    std::int64_t mFirstFrame = 0;          // of the moments
+    std::vector<SampledCurve> mCurves; // of the component being sampled, with and without keys
     TnFbxTime mTime;
     std::vector<float> mSamples;
 };

@@ -5,6 +5,7 @@
 // animation stack with the range of frames to read.
 #include "FbxSdk.h"
 
+#include "FrameTimes.h"
 #include "LastError.h"
 #include "NodeWalk.h"
 #include "PropertySampling.h"
@@ -98,7 +99,7 @@ std::int64_t samplesForFile(const std::string& fileName) {
 
 } // namespace
 
-FbxSdk::FbxSdk() : mSamplesLeft(detail::kUnlimitedSamples) {}
+FbxSdk::FbxSdk() : mSamplesLeft(detail::kUnlimitedSamples), mFrameTimes(std::make_unique<detail::FrameTimes>()) {}
 
 FbxSdk::~FbxSdk() {
     mInitialized = false;

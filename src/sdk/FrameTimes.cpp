@@ -1,0 +1,37 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// When frames are.
+#include "FrameTimes.h"
+
+namespace Tarnell::Fbx {
+
+namespace {
+
+/// Beyond, times are worked out one by one: a range may say more frames than there is memory for.
+constexpr std::size_t kMostKeptTimes = std::size_t{1} << 16;
+
+} // namespace
+
+void detail::FrameTimes::begin(std::int64_t firstFrame, float rate) {
+    if (mFirstFrame != firstFrame || mRate != rate) {
+        mTimes.clear();
+    }
+    mFirstFrame = firstFrame;
+    mRate = rate;
+}
+
+fbxsdk::FbxTime detail::FrameTimes::at(std::int64_t frame) {
+    const auto index = static_cast<std::size_t>(frame - mFirstFrame);
+    if (index < mTimes.size()) {
+        return mTimes[index];
+    }
+    fbxsdk::FbxTime time;
+    time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(mRate));
+    if (index < kMostKeptTimes) {
+        mTimes.push_back(time);
+    }
+    return time;
+}
+
+} // namespace Tarnell::Fbx
