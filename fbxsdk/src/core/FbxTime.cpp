@@ -6,7 +6,9 @@
 #include <fbxsdk/FbxTime.h>
 
 #include <algorithm>
+#include <bit>
 #include <cmath>
+#include <cstdint>
 #include <iterator>
 
 #include "core/TimeModes.h"
@@ -92,8 +94,7 @@ FbxLongLong saturated(Wide ticks) {
         std::clamp(ticks, static_cast<Wide>(FBXSDK_TC_MINFINITY), static_cast<Wide>(FBXSDK_TC_INFINITY)));
 }
 
-/// To the nearest tick, halves away from zero. Times are set for every sample: the library's rounding takes several
-/// times as long.
+/// To the nearest tick, halves away from zero. The library's rounding takes several times as long.
 FbxLongLong rounded(long double ticks) {
     const FbxLongLong whole = saturated(ticks);
     const long double rest = ticks - static_cast<long double>(whole); // exact, unless the whole is the end of the range
@@ -104,6 +105,28 @@ FbxLongLong rounded(long double ticks) {
 }
 
 Wide wide(FbxLongLong ticks) { return ticks; }
+
+/// The ticks of so many seconds, 0 of NaN. The product of the seconds' mantissa with the ticks of a second is exact, so
+/// that nothing is rounded but the last: to the nearest tick, halves away from zero. A time is set for every sample,
+/// and long double takes ten times as long.
+FbxLongLong ticksOfSeconds(double seconds) {
+    constexpr double kTooMany = 268435456.0; // 2^28, which is more ticks than there are
+    if (!(std::abs(seconds) < kTooMany)) {
+        return saturated(static_cast<long double>(seconds) * kTicksPerSecond);
+    }
+    constexpr int kMantissaBits = 52;
+    constexpr int kUnitExponent = 1075; // of a double whose mantissa counts ones
+    const auto bits = std::bit_cast<std::uint64_t>(std::abs(seconds));
+    const int exponent = static_cast<int>(bits >> kMantissaBits);
+    const int shift = kUnitExponent - exponent; // at least 25, as there are few seconds
+    if (shift > 90) {                           // the product has 89 bits at most; and here are all denormal numbers
+        return 0;
+    }
+    const std::uint64_t leadingBit = std::uint64_t{1} << kMantissaBits;
+    const Wide product = wide(static_cast<FbxLongLong>((bits & (leadingBit - 1)) | leadingBit)) * FBXSDK_TC_SECOND;
+    const FbxLongLong ticks = saturated((product + (wide(1) << (shift - 1))) >> shift);
+    return seconds < 0.0 ? -ticks : ticks;
+}
 
 /// Ticks per frame when that is a whole number, otherwise 0.
 FbxLongLong exactFrameTicks(double rate) {
@@ -132,7 +155,7 @@ void FbxTime::SetMilliSeconds(FbxLongLong pMilliSeconds) {
 
 FbxLongLong FbxTime::GetMilliSeconds() const { return mTime / FBXSDK_TC_MILLISECOND; }
 
-void FbxTime::SetSecondDouble(double pTime) { mTime = rounded(static_cast<long double>(pTime) * kTicksPerSecond); }
+void FbxTime::SetSecondDouble(double pTime) { mTime = ticksOfSeconds(pTime); }
 
 double FbxTime::GetSecondDouble() const {
     return static_cast<double>(static_cast<long double>(mTime) / kTicksPerSecond);

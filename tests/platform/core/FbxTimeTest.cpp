@@ -3,7 +3,9 @@
 //
 // Ticks, frames, seconds and time modes; spans of time.
 #include <cmath>
+#include <cstdint>
 #include <limits>
+#include <random>
 #include <set>
 #include <string>
 #include <thread>
@@ -176,6 +178,27 @@ TEST(FbxTime, RoundsSecondsToTheNearestTick) {
     EXPECT_EQ(FbxTime(-46186158000).GetSecondDouble(), -1.0);
 }
 
+TEST(FbxTime, RoundsHalvesAwayFromZero) {
+    EXPECT_EQ(atSeconds(1.0 / 32.0).Get(), 1443317438); // 1443317437.5
+    EXPECT_EQ(atSeconds(-1.0 / 32.0).Get(), -1443317438);
+    EXPECT_EQ(atSeconds(std::nextafter(1.0 / 32.0, 0.0)).Get(), 1443317437);
+    EXPECT_EQ(atSeconds(std::nextafter(-1.0 / 32.0, 0.0)).Get(), -1443317437);
+}
+
+TEST(FbxTime, IsTheNearestTickToAnySeconds) {
+    __extension__ typedef __int128 Wide;
+    std::mt19937_64 random(2'026);
+    for (int i = 0; i < 200'000; ++i) {
+        const int binaryPlaces = 26 + static_cast<int>(random() % 44);
+        const auto number = static_cast<std::int64_t>(random() >> (11 + random() % 53));
+        const Wide half = Wide{1} << (binaryPlaces - 1);
+        const auto nearest = static_cast<FbxLongLong>((Wide{number} * 46186158000 + half) >> binaryPlaces);
+        const double seconds = std::ldexp(static_cast<double>(number), -binaryPlaces); // exact
+        ASSERT_EQ(atSeconds(seconds).Get(), nearest) << number << " / 2^" << binaryPlaces;
+        ASSERT_EQ(atSeconds(-seconds).Get(), -nearest) << -number << " / 2^" << binaryPlaces;
+    }
+}
+
 TEST(FbxTime, SaturatesSecondsThatAreNoTime) {
     EXPECT_EQ(atSeconds(kNaN).Get(), 0);
     EXPECT_EQ(atSeconds(kInfinity), FBXSDK_TIME_INFINITE);
@@ -183,6 +206,14 @@ TEST(FbxTime, SaturatesSecondsThatAreNoTime) {
     EXPECT_EQ(atSeconds(1.0e300), FBXSDK_TIME_INFINITE);
     EXPECT_EQ(atSeconds(-1.0e18), FBXSDK_TIME_MINUS_INFINITE);
     EXPECT_EQ(atSeconds(1.0e-320).Get(), 0);
+    EXPECT_EQ(atSeconds(0.0).Get(), 0);
+    EXPECT_EQ(atSeconds(-0.0).Get(), 0);
+    EXPECT_EQ(atSeconds(1.0e-28).Get(), 0);
+    EXPECT_EQ(atSeconds(199'697'755.0).Get(), 9223272064675290000);
+    EXPECT_EQ(atSeconds(200'000'000.0), FBXSDK_TIME_INFINITE);
+    EXPECT_EQ(atSeconds(-200'000'000.0), FBXSDK_TIME_MINUS_INFINITE);
+    EXPECT_EQ(atSeconds(std::nextafter(268435456.0, 0.0)), FBXSDK_TIME_INFINITE);
+    EXPECT_EQ(atSeconds(268435456.0), FBXSDK_TIME_INFINITE);
 }
 
 TEST(FbxTime, HasTheDocumentedInfiniteTimes) {
