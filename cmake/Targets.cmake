@@ -1,6 +1,24 @@
 # One object library per layer of the platform, so that a layer can be built and tested alone; one test
 # executable per folder of tests.
 
+# tarnell_precompile(TARGET header...)
+function(tarnell_precompile name)
+  target_precompile_headers(${name} PRIVATE ${ARGN})
+  if(CMAKE_CXX_COMPILER_ID MATCHES "Clang")
+    # A header that was read anew from the same text is the same, for ccache too.
+    target_compile_options(${name} PRIVATE "SHELL:-Xclang -fno-pch-timestamp")
+  endif()
+endfunction()
+
+# Builds with sanitizers read what most sources include only once. The others do without: they show whether each source
+# includes what it uses.
+function(tarnell_precompile_standard_headers name)
+  if(TARNELL_FBX_SANITIZE)
+    tarnell_precompile(${name}
+      <algorithm> <functional> <memory> <span> <string> <string_view> <unordered_map> <vector>)
+  endif()
+endfunction()
+
 # tarnell_layer(NAME [DEPENDS layer...]): every source of this folder's subfolder NAME.
 function(tarnell_layer name)
   cmake_parse_arguments(ARG "" "" "DEPENDS" ${ARGN})
@@ -16,21 +34,20 @@ function(tarnell_layer name)
   if(ARG_DEPENDS)
     target_link_libraries(fbxsdk_${name} PUBLIC ${ARG_DEPENDS})
   endif()
+  tarnell_precompile_standard_headers(fbxsdk_${name})
 endfunction()
 
-# To read GoogleTest takes longer than to compile most tests: the first test executable reads it for all.
+# To read GoogleTest takes longer than to compile most tests: an empty program reads it for all.
 function(tarnell_precompile_test_headers name)
-  get_property(owner GLOBAL PROPERTY TARNELL_TEST_HEADERS_OWNER)
-  if(owner)
-    target_precompile_headers(${name} REUSE_FROM ${owner})
-    return()
+  if(NOT TARGET test_headers)
+    set(empty "${CMAKE_CURRENT_BINARY_DIR}/test_headers.cpp")
+    file(CONFIGURE OUTPUT "${empty}" CONTENT "")
+    add_executable(test_headers "${empty}")
+    target_link_libraries(test_headers PRIVATE tarnell_settings GTest::gtest GTest::gmock GTest::gtest_main)
+    target_compile_options(test_headers PRIVATE -O0)
+    tarnell_precompile(test_headers <gmock/gmock.h> <gtest/gtest.h>)
   endif()
-  target_precompile_headers(${name} PRIVATE <gmock/gmock.h> <gtest/gtest.h>)
-  if(CMAKE_CXX_COMPILER_ID MATCHES "Clang")
-    # A header that was read anew from the same text is the same, for ccache too.
-    target_compile_options(${name} PRIVATE "SHELL:-Xclang -fno-pch-timestamp")
-  endif()
-  set_property(GLOBAL PROPERTY TARNELL_TEST_HEADERS_OWNER ${name})
+  target_precompile_headers(${name} REUSE_FROM test_headers)
 endfunction()
 
 # tarnell_test(NAME FOLDER folder LINK target...): every *Test.cpp of the folder becomes one executable.

@@ -14,7 +14,8 @@ class FbxScene;
 
 class FBXSDK_DLL FbxGeometryConverter {
 public:
-    explicit FbxGeometryConverter(FbxManager* pManager) : mManager(pManager) {}
+    /// Objects are made by the manager of what is converted, whichever this one is.
+    explicit FbxGeometryConverter(FbxManager*) {}
 
     /// A mesh of triangles for a NURBS surface, patch or mesh, with materials, skins and shapes carried over; the
     /// attribute itself when it is a mesh of triangles already. Null for other kinds and for degenerate surfaces.
@@ -24,9 +25,6 @@ public:
     FbxNodeAttribute* Triangulate(FbxNodeAttribute* pNodeAttribute, bool pReplace, bool pLegacy = false);
     /// The same for every attribute of the scene that it applies to. False when one of them could not be converted.
     bool Triangulate(FbxScene* pScene, bool pReplace, bool pLegacy = false);
-
-private:
-    FbxManager* mManager;
 };
 
 FBXSDK_NAMESPACE_END

@@ -87,7 +87,7 @@ std::string clean(const std::string& text) {
     return result.empty() && !text.empty() ? "." : result;
 }
 
-std::string bind(std::string root, const std::string& file) {
+std::string joined(std::string root, const std::string& file) {
     if (root.empty() || isAbsolute(file)) {
         return file;
     }
@@ -105,7 +105,7 @@ std::string currentDirectory() {
     return std::string(utf8.begin(), utf8.end());
 }
 
-std::string resolve(const std::string& text) { return clean(bind(currentDirectory(), text)); }
+std::string resolve(const std::string& text) { return clean(joined(currentDirectory(), text)); }
 
 /// Drive letters do not distinguish case; server names and components do.
 bool sameRoot(const std::string& a, const std::string& b) {
@@ -144,7 +144,7 @@ FbxString toFbxString(const std::string& text) { return FbxString(text.c_str());
 } // namespace
 
 FbxString FbxPathUtils::Bind(const char* pRootPath, const char* pFilePath, bool pCleanPath) {
-    const std::string path = bind(withForwardSlashes(pRootPath), withForwardSlashes(pFilePath));
+    const std::string path = joined(withForwardSlashes(pRootPath), withForwardSlashes(pFilePath));
     return toFbxString(pCleanPath ? clean(path) : path);
 }
 
@@ -221,7 +221,7 @@ FbxString FbxPathUtils::GenerateFileName(const char* pFolder, const char* pPrefi
     constexpr int kAttempts = 100000;
     const std::string folder = withForwardSlashes(pFolder);
     for (int number = 1; number <= kAttempts; ++number) {
-        const std::string path = bind(folder, std::string(pPrefix ? pPrefix : "") + std::to_string(number));
+        const std::string path = joined(folder, std::string(pPrefix ? pPrefix : "") + std::to_string(number));
         std::error_code error;
         if (!fs::exists(toSystemPath(path), error)) {
             return toFbxString(path);
