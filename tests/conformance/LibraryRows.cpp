@@ -42,10 +42,6 @@ constexpr std::array kMeshTypes = {FbxNodeAttribute::eMesh};
 constexpr std::array kTransformTypes = {FbxNodeAttribute::eUnknown, FbxNodeAttribute::eNull, FbxNodeAttribute::eMarker,
                                         FbxNodeAttribute::eMesh};
 
-/// Longer clips (five files, of millions of frames) would take a minute: samples in the world are made for every frame.
-/// Local samples of them are compared.
-constexpr double kLongestSampledSeconds = 3600;
-
 /// Of a node without an attribute: unknown.
 FbxNodeAttribute::EType typeOf(const fbxsdk::FbxNode& node) {
     const FbxNodeAttribute* attribute = node.GetNodeAttribute();
@@ -236,8 +232,6 @@ void checkLibraryPositions(LoadedFile& file, Findings& findings) {
     if (!file.loaded())
         return;
     const Reference& reference = file.reference();
-    if (!reference.stacks.empty() && reference.stacks[0].end - reference.stacks[0].begin > kLongestSampledSeconds)
-        return;
     TnFbxReadInfo info;
     const auto list = read<TnFbxTransform>(file, info, &Fbx::getTransforms, kTransformTypes, findings);
     for (const Handed<TnFbxTransform>& handed : list.matched) {
