@@ -23,7 +23,7 @@ FbxAnimCurveNode::~FbxAnimCurveNode() = default;
 namespace {
 
 /// The channels of a property: as many as it holds numbers, up to four; none for text and references.
-int componentCount(EFbxType type) {
+int channelCount(EFbxType type) {
     switch (type) {
     case eFbxDouble2:
         return 2;
@@ -69,7 +69,7 @@ const char* curveNodeName(const char* propertyName) {
 FbxAnimCurveNode* FbxAnimCurveNode::CreateTypedCurveNode(FbxProperty& pProperty, FbxScene* pScene) {
     if (!pProperty.IsValid())
         return nullptr;
-    const int count = componentCount(pProperty.GetPropertyDataType().GetType());
+    const int count = channelCount(pProperty.GetPropertyDataType().GetType());
     if (count == 0)
         return nullptr;
     const char* name = curveNodeName(pProperty.GetNameAsCStr());

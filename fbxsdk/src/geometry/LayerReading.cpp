@@ -19,6 +19,7 @@
 #include <string_view>
 #include <utility>
 
+#include "geometry/LayerChannels.h"
 #include "geometry/LayerElementAccess.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -68,31 +69,6 @@ const ElementKind kKinds[] = {
      "PolygonGroup"},
 };
 
-/// Textures and texture coordinates exist once for each channel: "LayerElementBumpTextures", "LayerElementBumpUV".
-struct ChannelRow {
-    std::string_view textures, uvs;
-    Element::EType channel;
-};
-
-constexpr ChannelRow kChannels[] = {
-    {"LayerElementTexture", "LayerElementUV", Element::eTextureDiffuse},
-    {"LayerElementDiffuseFactorTextures", "LayerElementDiffuseFactorUV", Element::eTextureDiffuseFactor},
-    {"LayerElementEmissive_Textures", "LayerElementEmissiveUV", Element::eTextureEmissive},
-    {"LayerElementEmissiveFactorTextures", "LayerElementEmissiveFactorUV", Element::eTextureEmissiveFactor},
-    {"LayerElementAmbientTextures", "LayerElementAmbientUV", Element::eTextureAmbient},
-    {"LayerElementAmbientFactorTextures", "LayerElementAmbientFactorUV", Element::eTextureAmbientFactor},
-    {"LayerElementSpecularTextures", "LayerElementSpecularUV", Element::eTextureSpecular},
-    {"LayerElementSpecularFactorTextures", "LayerElementSpecularFactorUV", Element::eTextureSpecularFactor},
-    {"LayerElementShininessTextures", "LayerElementShininessUV", Element::eTextureShininess},
-    {"LayerElementNormalMapTextures", "LayerElementNormalMapUV", Element::eTextureNormalMap},
-    {"LayerElementBumpTextures", "LayerElementBumpUV", Element::eTextureBump},
-    {"LayerElementTransparentTextures", "LayerElementTransparentUV", Element::eTextureTransparency},
-    {"LayerElementTransparencyFactorTextures", "LayerElementTransparencyFactorUV", Element::eTextureTransparencyFactor},
-    {"LayerElementReflectionTextures", "LayerElementReflectionUV", Element::eTextureReflection},
-    {"LayerElementReflectionFactorTextures", "LayerElementReflectionFactorUV", Element::eTextureReflectionFactor},
-    {"LayerElementDisplacementTextures", "LayerElementDisplacementUV", Element::eTextureDisplacement},
-};
-
 struct MappingRow {
     std::string_view spelling;
     Element::EMappingMode mode;
@@ -113,7 +89,7 @@ std::optional<ElementKind> kindOf(std::string_view record) {
         if (kind.record == record)
             return kind;
     }
-    for (const ChannelRow& row : kChannels) {
+    for (const LayerChannelRow& row : kLayerChannels) {
         if (row.uvs == record)
             return ElementKind{row.uvs,  Access::uvSlot(row.channel), create<FbxLayerElementUV>, Storage::values, "UV",
                                "UVIndex"};

@@ -136,5 +136,18 @@ FbxDataType dataTypeOf(std::string_view typeName, std::string_view subTypeName) 
     return FbxBlobDT;
 }
 
+std::size_t componentCount(EFbxType type) {
+    switch (type) {
+    case eFbxDouble2:
+        return 2;
+    case eFbxDouble3:
+        return 3;
+    case eFbxDouble4:
+        return 4;
+    default:
+        return 1;
+    }
+}
+
 } // namespace detail
 FBXSDK_NAMESPACE_END

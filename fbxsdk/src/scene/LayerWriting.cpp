@@ -11,6 +11,7 @@
 #include <vector>
 
 #include "document/RecordWriting.h"
+#include "geometry/LayerChannels.h"
 #include "geometry/LayerElementAccess.h"
 #include "scene/GeometryWriting.h"
 
@@ -177,37 +178,12 @@ const ElementKind kKindsBehindUVs[] = {
     {"LayerElementMaterial", Element::eMaterial, 101, 101, Reference::indexToDirect, writeMaterials},
 };
 
-/// Textures and texture coordinates exist once for each channel.
-struct ChannelRow {
-    std::string_view textures, uvs;
-    Element::EType channel;
-};
-
-constexpr ChannelRow kChannels[] = {
-    {"LayerElementTexture", "LayerElementUV", Element::eTextureDiffuse},
-    {"LayerElementDiffuseFactorTextures", "LayerElementDiffuseFactorUV", Element::eTextureDiffuseFactor},
-    {"LayerElementEmissive_Textures", "LayerElementEmissiveUV", Element::eTextureEmissive},
-    {"LayerElementEmissiveFactorTextures", "LayerElementEmissiveFactorUV", Element::eTextureEmissiveFactor},
-    {"LayerElementAmbientTextures", "LayerElementAmbientUV", Element::eTextureAmbient},
-    {"LayerElementAmbientFactorTextures", "LayerElementAmbientFactorUV", Element::eTextureAmbientFactor},
-    {"LayerElementSpecularTextures", "LayerElementSpecularUV", Element::eTextureSpecular},
-    {"LayerElementSpecularFactorTextures", "LayerElementSpecularFactorUV", Element::eTextureSpecularFactor},
-    {"LayerElementShininessTextures", "LayerElementShininessUV", Element::eTextureShininess},
-    {"LayerElementNormalMapTextures", "LayerElementNormalMapUV", Element::eTextureNormalMap},
-    {"LayerElementBumpTextures", "LayerElementBumpUV", Element::eTextureBump},
-    {"LayerElementTransparentTextures", "LayerElementTransparentUV", Element::eTextureTransparency},
-    {"LayerElementTransparencyFactorTextures", "LayerElementTransparencyFactorUV", Element::eTextureTransparencyFactor},
-    {"LayerElementReflectionTextures", "LayerElementReflectionUV", Element::eTextureReflection},
-    {"LayerElementReflectionFactorTextures", "LayerElementReflectionFactorUV", Element::eTextureReflectionFactor},
-    {"LayerElementDisplacementTextures", "LayerElementDisplacementUV", Element::eTextureDisplacement},
-};
-
 std::vector<ElementKind> allKinds() {
     std::vector<ElementKind> kinds(std::begin(kKinds), std::end(kKinds));
-    for (const ChannelRow& row : kChannels)
+    for (const LayerChannelRow& row : kLayerChannels)
         kinds.push_back({row.uvs, Access::uvSlot(row.channel), 101, 101, Reference::asSet, writeUVs});
     kinds.insert(kinds.end(), std::begin(kKindsBehindUVs), std::end(kKindsBehindUVs));
-    for (const ChannelRow& row : kChannels)
+    for (const LayerChannelRow& row : kLayerChannels)
         kinds.push_back({row.textures, row.channel, 101, 101, Reference::indexToDirect, writeTextures});
     return kinds;
 }

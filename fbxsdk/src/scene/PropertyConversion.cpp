@@ -19,6 +19,8 @@
 #include <fbxsdk/FbxString.h>
 #include <fbxsdk/FbxTime.h>
 
+#include "scene/PropertyTypes.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
@@ -97,19 +99,6 @@ void withWholeType(EFbxType type, const Use& use) {
     default:
         use(FbxInt{});
         break; // int and enumerations
-    }
-}
-
-std::size_t componentCount(EFbxType type) {
-    switch (type) {
-    case eFbxDouble2:
-        return 2;
-    case eFbxDouble3:
-        return 3;
-    case eFbxDouble4:
-        return 4;
-    default:
-        return 1;
     }
 }
 

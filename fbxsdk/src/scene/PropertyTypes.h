@@ -4,6 +4,7 @@
 // The table of property types, and which row a file's two type strings mean.
 #pragma once
 
+#include <cstddef>
 #include <string_view>
 
 #include <fbxsdk/FbxDataType.h>
@@ -13,6 +14,9 @@ namespace detail {
 
 /// A blob for type strings that are not in the table: such a property keeps no value.
 [[nodiscard]] FbxDataType dataTypeOf(std::string_view typeName, std::string_view subTypeName);
+
+/// How many numbers a value of the type is; 1 of those that are none as well.
+[[nodiscard]] std::size_t componentCount(EFbxType type);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

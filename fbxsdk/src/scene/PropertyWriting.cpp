@@ -73,19 +73,6 @@ std::string flagText(unsigned flags, bool animated) {
     return text;
 }
 
-std::size_t numberCount(EFbxType type) {
-    switch (type) {
-    case eFbxDouble2:
-        return 2;
-    case eFbxDouble3:
-        return 3;
-    case eFbxDouble4:
-        return 4;
-    default:
-        return 1;
-    }
-}
-
 std::span<const Value> valuesOf(const FbxDataType& type, const PropertyValue& value, RecordTree& texts) {
     switch (type.GetType()) {
     case eFbxUndefined:
@@ -102,7 +89,7 @@ std::span<const Value> valuesOf(const FbxDataType& type, const PropertyValue& va
     case eFbxDouble4:
     case eFbxHalfFloat:
     case eFbxDistance: {
-        const std::span<Value> kept = texts.newValues(numberCount(type.GetType()));
+        const std::span<Value> kept = texts.newValues(componentCount(type.GetType()));
         std::transform(value.numbers.begin(), value.numbers.begin() + static_cast<std::ptrdiff_t>(kept.size()),
                        kept.begin(), Value::ofReal);
         return kept;

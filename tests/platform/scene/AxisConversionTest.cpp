@@ -11,10 +11,7 @@
 #include <fbxsdk/FbxCluster.h>
 #include <fbxsdk/FbxNode.h>
 
-#include "Animate.h"
-#include "PlainMatrix.h"
-#include "SceneFixture.h"
-#include "SeededRandom.h"
+#include "ConversionFixture.h"
 
 namespace {
 
@@ -23,9 +20,6 @@ using animate::addLayer;
 using animate::addStack;
 using animate::keys;
 using animate::seconds;
-
-constexpr auto kSet = FbxNode::eSourcePivot;
-constexpr double kTimes[] = {-1, 0, 0.3, 1, 1.7, 5};
 
 /// Up, front and the third axis of a system as the columns of a matrix.
 plain::Matrix basisOf(const FbxAxisSystem& system) {
@@ -58,39 +52,14 @@ std::vector<FbxAxisSystem> rightHandedSystems() {
     return systems;
 }
 
-class AxisConversionTest : public SceneFixture {
+class AxisConversionTest : public ConversionFixture {
 protected:
-    FbxNode* addNode(const char* name, FbxNode* parent = nullptr) {
-        FbxNode* node = make<FbxNode>(name);
-        (parent ? parent : scene->GetRootNode())->AddChild(node);
-        return node;
-    }
-
-    std::vector<plain::Matrix> globals() {
-        std::vector<plain::Matrix> matrices;
-        for (int i = 1; i < scene->GetNodeCount(); ++i) {
-            FbxNode* node = scene->GetNode(i);
-            matrices.push_back(plain::of(node->EvaluateGlobalTransform()));
-            for (const double time : kTimes)
-                matrices.push_back(plain::of(node->EvaluateGlobalTransform(seconds(time))));
-        }
-        return matrices;
-    }
-
     void expectAllTurned(const FbxAxisSystem& source, const FbxAxisSystem& target) {
         scene->GetGlobalSettings().SetAxisSystem(source);
         const auto before = globals();
         target.ConvertScene(scene);
-        const auto after = globals();
-        const plain::Matrix turn = turnBetween(source, target);
-        for (std::size_t i = 0; i < before.size(); ++i) {
-            const plain::Matrix expected = turn * before[i];
-            // The pre-rotation passes through angles: double precision, but at right angles near the pole.
-            EXPECT_LT(plain::difference(after[i], expected), 1e-7 * (1.0 + plain::largest(expected)))
-                << scene->GetNode(static_cast<int>(i / 7) + 1)->GetName() << ", time " << i % 7 << "\n"
-                << plain::text(after[i]) << "instead of\n"
-                << plain::text(expected);
-        }
+        // The pre-rotation passes through angles: double precision, but at right angles near the pole.
+        expectAllChanged(before, turnBetween(source, target), 1e-7);
         EXPECT_EQ(scene->GetGlobalSettings().GetAxisSystem(), target);
     }
 
@@ -99,19 +68,10 @@ protected:
         FbxNode* parent = nullptr;
         for (int i = 0; i < 16; ++i) {
             FbxNode* node = addNode(("n" + std::to_string(i)).c_str(), i % 4 ? parent : nullptr);
-            node->LclTranslation.Set(random.triple(-5, 5));
-            node->LclRotation.Set(random.triple(-180, 180));
-            node->LclScaling.Set(random.triple(0.4, 2));
+            randomise(*node, random, 180);
             node->SetRotationActive(random.chance(2));
             node->SetRotationSpaceForLimitOnly(kSet, random.chance(4));
             node->SetRotationOrder(kSet, static_cast<FbxEuler::EOrder>(random.whole(6)));
-            node->SetPreRotation(kSet, random.vector(-180, 180));
-            node->SetPostRotation(kSet, random.vector(-180, 180));
-            node->SetRotationOffset(kSet, random.vector(-2, 2));
-            node->SetRotationPivot(kSet, random.vector(-2, 2));
-            node->SetScalingOffset(kSet, random.vector(-2, 2));
-            node->SetScalingPivot(kSet, random.vector(-2, 2));
-            node->SetTransformationInheritType(static_cast<FbxTransform::EInheritType>(random.whole(3)));
             for (const char* component : {"X", "Y", "Z"}) {
                 if (random.chance(2))
                     keys(node->LclTranslation, layer, component, {{0, random.real(-9, 9)}, {1, random.real(-9, 9)}});

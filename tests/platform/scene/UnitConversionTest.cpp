@@ -12,10 +12,7 @@
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxSystemUnit.h>
 
-#include "Animate.h"
-#include "PlainMatrix.h"
-#include "SceneFixture.h"
-#include "SeededRandom.h"
+#include "ConversionFixture.h"
 
 namespace {
 
@@ -25,60 +22,21 @@ using animate::addStack;
 using animate::keys;
 using animate::seconds;
 
-constexpr auto kSet = FbxNode::eSourcePivot;
-constexpr double kTimes[] = {-1, 0, 0.3, 1, 1.7, 5};
-
-class UnitConversionTest : public SceneFixture {
+class UnitConversionTest : public ConversionFixture {
 protected:
-    FbxNode* addNode(const char* name, FbxNode* parent = nullptr) {
-        FbxNode* node = make<FbxNode>(name);
-        (parent ? parent : scene->GetRootNode())->AddChild(node);
-        return node;
-    }
-
-    /// The global matrices of all nodes at infinity and at a handful of times.
-    std::vector<plain::Matrix> globals() {
-        std::vector<plain::Matrix> matrices;
-        for (int i = 0; i < scene->GetNodeCount(); ++i) {
-            FbxNode* node = scene->GetNode(i);
-            matrices.push_back(plain::of(node->EvaluateGlobalTransform()));
-            for (const double time : kTimes)
-                matrices.push_back(plain::of(node->EvaluateGlobalTransform(seconds(time))));
-        }
-        return matrices;
-    }
-
     /// Converts from metres (k = 100) and compares everything but the root.
     void expectAllScaled(const FbxSystemUnit& source, const FbxSystemUnit& target) {
         scene->GetGlobalSettings().SetSystemUnit(source);
         const double k = source.GetConversionFactorTo(target);
         const auto before = globals();
         target.ConvertScene(scene);
-        const auto after = globals();
-        constexpr std::size_t perNode = std::size(kTimes) + 1;
-        ASSERT_EQ(before.size(), after.size());
-        for (std::size_t i = perNode; i < before.size(); ++i) {
-            const plain::Matrix expected = plain::scaling(FbxDouble3(k, k, k)) * before[i];
-            // Keys are of single precision, and are multiplied as such.
-            EXPECT_LT(plain::difference(after[i], expected), 4e-6 * (1.0 + plain::largest(expected)))
-                << scene->GetNode(static_cast<int>(i / perNode))->GetName() << ", time " << i % perNode << "\n"
-                << plain::text(after[i]) << "instead of\n"
-                << plain::text(expected);
-        }
+        // Keys are of single precision, and are multiplied as such.
+        expectAllChanged(before, plain::scaling(FbxDouble3(k, k, k)), 4e-6);
     }
 
     static void randomise(FbxNode& node, SeededRandom& random) {
-        node.LclTranslation.Set(random.triple(-5, 5));
-        node.LclRotation.Set(random.triple(-180, 180));
-        node.LclScaling.Set(random.triple(0.4, 2));
+        ConversionFixture::randomise(node, random, 90);
         node.SetRotationActive(true);
-        node.SetPreRotation(kSet, random.vector(-90, 90));
-        node.SetPostRotation(kSet, random.vector(-90, 90));
-        node.SetRotationOffset(kSet, random.vector(-2, 2));
-        node.SetRotationPivot(kSet, random.vector(-2, 2));
-        node.SetScalingOffset(kSet, random.vector(-2, 2));
-        node.SetScalingPivot(kSet, random.vector(-2, 2));
-        node.SetTransformationInheritType(static_cast<FbxTransform::EInheritType>(random.whole(3)));
     }
 
     static void animateRandomly(FbxNode& node, FbxAnimLayer* layer, SeededRandom& random) {
