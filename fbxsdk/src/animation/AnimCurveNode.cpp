@@ -11,6 +11,7 @@
 #include <fbxsdk/FbxScene.h>
 
 #include "scene/ManagerData.h"
+#include "scene/PropertyTypes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 
@@ -25,29 +26,18 @@ namespace {
 /// The channels of a property: as many as it holds numbers, up to four; none for text and references.
 int channelCount(EFbxType type) {
     switch (type) {
-    case eFbxDouble2:
-        return 2;
-    case eFbxDouble3:
-        return 3;
-    case eFbxDouble4:
-        return 4;
-    case eFbxChar:
-    case eFbxUChar:
-    case eFbxShort:
-    case eFbxUShort:
-    case eFbxInt:
-    case eFbxUInt:
-    case eFbxLongLong:
-    case eFbxULongLong:
-    case eFbxHalfFloat:
-    case eFbxBool:
-    case eFbxFloat:
-    case eFbxDouble:
-    case eFbxEnum:
-    case eFbxDistance:
-        return 1;
-    default:
+    case eFbxUndefined:
+    case eFbxDouble4x4:
+    case eFbxString:
+    case eFbxTime:
+    case eFbxReference:
+    case eFbxBlob:
+    case eFbxDateTime:
+    case eFbxEnumM:
+    case eFbxTypeCount:
         return 0;
+    default:
+        return static_cast<int>(detail::componentCount(type));
     }
 }
 
