@@ -170,6 +170,18 @@ TEST_P(VertexCache, ThatDoesNotOpenLeavesShapesAndSkin) {
     expectPoint(points[1], 1.0, 100.0, 0.0);
 }
 
+TEST_P(VertexCache, ThatIsCutOffLeavesThePointsAlone) {
+    CacheScene scene(GetParam());
+    const char* data = GetParam() == FbxCache::eMayaCache ? "points.mc" : "points.pc2";
+    const std::string whole = scene.folder.read(data);
+    ASSERT_FALSE(whole.empty());
+    scene.folder.write(data, whole.substr(0, whole.size() - 1));
+
+    scene.sdk.openClosePointCacheData(scene.scene, true);
+
+    expectPoint(deformed(scene, scene.node, 1)[1], 1.0, 0.0, 0.0);
+}
+
 TEST_P(VertexCache, OfAnInstanceStaysOpenForBothNodes) {
     CacheScene scene(GetParam());
     scene.addNode("instance")->SetNodeAttribute(scene.node->GetMesh());

@@ -111,7 +111,11 @@ class MayaCache(Cache):
 
     def test_data_that_is_cut_off_before_the_first_sample(self):
         self.change(".mcx", lambda old: old[:60])
-        self.check_unused(r"moving\.xml: no samples in its data files")
+        self.check_unused(r"moving\.mcx: offset \d+: cut off or damaged")
+
+    def test_data_that_is_cut_off_in_the_last_sample(self):
+        self.change(".mcx", lambda old: old[:-1])
+        self.check_unused(r"moving\.mcx: offset \d+: cut off or damaged")
 
     def test_data_that_is_no_cache(self):
         self.change(".mcx", lambda old: bytes(len(old)))

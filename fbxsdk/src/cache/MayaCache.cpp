@@ -83,10 +83,17 @@ std::unique_ptr<MayaCacheReader> MayaCacheReader::open(const std::string& descri
 }
 
 void MayaCacheReader::openOneFile(const std::string& base, FbxStatus& status) {
-    mData = MappedFile::open(base + mDescription.dataExtension(), status);
+    const std::string file = base + mDescription.dataExtension();
+    mData = MappedFile::open(file, status);
     if (!mData)
         return;
-    for (MayaCacheFrame& frame : parseMayaCacheData(mData->bytes())) {
+    MayaCacheData data = parseMayaCacheData(mData->bytes());
+    // What is missing would read as the last sample that is there.
+    if (data.end < mData->bytes().size()) {
+        status.SetCode(FbxStatus::eInvalidFile, "%s: offset %zu: cut off or damaged", file.c_str(), data.end);
+        return;
+    }
+    for (MayaCacheFrame& frame : data.frames) {
         const std::int32_t ticks = frame.hasTime ? frame.ticks : mDescription.start;
         mSamples.try_emplace(ticks, Sample{{}, std::move(frame)}); // of equal times the first counts
     }
@@ -117,7 +124,7 @@ bool MayaCacheReader::readSample(const Sample& sample, const std::string& channe
         file = MappedFile::open(sample.file, status);
         if (!file)
             return false;
-        frames = parseMayaCacheData(file->bytes());
+        frames = parseMayaCacheData(file->bytes()).frames;
         if (frames.empty()) {
             status.SetCode(FbxStatus::eInvalidFile, "%s: no sample in it", sample.file.c_str());
             return false;

@@ -20,7 +20,7 @@ namespace detail {
 /// Samples by time over one data file or over one file per sample.
 class MayaCacheReader {
 public:
-    /// Null when the description or every data file is missing or damaged.
+    /// Null when the description, the only data file or every one of them is missing or damaged.
     [[nodiscard]] static std::unique_ptr<MayaCacheReader> open(const std::string& descriptionFile, FbxStatus& status);
 
     [[nodiscard]] const MayaCacheDescription& description() const { return mDescription; }

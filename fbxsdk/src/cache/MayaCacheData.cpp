@@ -146,19 +146,22 @@ std::string blockBytes(const MayaCacheWriteBlock& block) {
 
 } // namespace
 
-std::vector<MayaCacheFrame> parseMayaCacheData(std::span<const char> bytes) {
-    std::vector<MayaCacheFrame> frames;
-    if (bytes.size() < 4)
-        return frames;
-    const bool wide = std::string_view(bytes.data(), 4) == kWide.groupTag;
+MayaCacheData parseMayaCacheData(std::span<const char> bytes) {
+    MayaCacheData data;
+    const bool wide = bytes.size() >= 4 && std::string_view(bytes.data(), 4) == kWide.groupTag;
     const Layout& layout = wide ? kWide : kNarrow;
+    std::span<const char> rest = bytes;
     std::string_view type;
     std::span<const char> content;
-    while (nextGroup(layout, bytes, type, content)) {
+    while (nextGroup(layout, rest, type, content)) {
+        data.end = bytes.size() - rest.size();
         if (type == "MYCH")
-            frames.push_back(parseFrame(layout, content));
+            data.frames.push_back(parseFrame(layout, content));
     }
-    return frames;
+    const auto behind = bytes.subspan(data.end);
+    if (std::all_of(behind.begin(), behind.end(), [](char byte) { return byte == '\0'; }))
+        data.end = bytes.size();
+    return data;
 }
 
 bool readMayaCacheBlock(const MayaCacheBlock& block, std::span<double> destination) {

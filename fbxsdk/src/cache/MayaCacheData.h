@@ -10,6 +10,7 @@
 // payload padded to 8.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <span>
@@ -41,8 +42,13 @@ struct MayaCacheFrame {
     std::vector<MayaCacheBlock> blocks;
 };
 
-/// Cuts a data file into its frames. Damage ends the list: what stood before it is kept.
-[[nodiscard]] std::vector<MayaCacheFrame> parseMayaCacheData(std::span<const char> bytes);
+struct MayaCacheData {
+    std::vector<MayaCacheFrame> frames;
+    /// Where the file is cut off or damaged; behind its last byte when it is sound.
+    std::size_t end = 0;
+};
+/// Cuts a data file into its frames. Zeros behind the last one are no damage.
+[[nodiscard]] MayaCacheData parseMayaCacheData(std::span<const char> bytes);
 
 /// Reads the first points of a block, widened to double or narrowed to float. False when the block is no vector array
 /// or has another number of points.

@@ -186,23 +186,48 @@ TEST(MayaCache, RefusesDescriptionsThatAreNone) {
     EXPECT_FALSE(readMayaCacheDescription(folder.file("missing.xml"), description, status));
 }
 
-TEST(MayaCache, KeepsTheSamplesBeforeADamage) {
+TEST(MayaCache, RefusesDataThatIsCutOff) {
     const support::TemporaryFolder folder;
     const std::string file = writeBall(folder, true);
     const std::string whole = folder.read("ball.mcx");
 
+    int opened = 0;
     for (std::size_t length = 0; length < whole.size(); ++length) {
         folder.write("ball.mcx", whole.substr(0, length));
         FbxStatus status;
-        auto reader = MayaCacheReader::open(file, status);
-        if (!reader)
-            continue;
-        std::array<double, 6> points{};
-        // The last sample that is there may be cut; a sample that is read is a true one.
-        if (reader->read("ball", 10 / 24.0, points, status)) {
-            EXPECT_EQ(points[0], 10.0) << length;
-        }
+        const auto reader = MayaCacheReader::open(file, status);
+        opened += reader ? 1 : 0;
+        EXPECT_EQ(status.Error(), !reader) << length;
     }
+    EXPECT_EQ(opened, 2); // right behind the first and the second sample
+}
+
+TEST(MayaCache, SaysWhereItsDataIsDamaged) {
+    const support::TemporaryFolder folder;
+    const std::string file = writeBall(folder, true);
+    std::string data = folder.read("ball.mcx");
+    const std::size_t header = mayaCacheHeader(true, 0, 1).size();
+    const std::size_t second = header + (data.size() - header) / 3; // of three samples
+    data[second] = 'f';
+    folder.write("ball.mcx", data);
+
+    FbxStatus status;
+    EXPECT_FALSE(MayaCacheReader::open(file, status));
+
+    EXPECT_STREQ(status.GetErrorString(),
+                 (folder.file("ball.mcx") + ": offset " + std::to_string(second) + ": cut off or damaged").c_str());
+}
+
+TEST(MayaCache, TakesZerosBehindItsSamples) {
+    const support::TemporaryFolder folder;
+    const std::string file = writeBall(folder, true);
+    folder.write("ball.mcx", folder.read("ball.mcx") + std::string(100, '\0'));
+
+    FbxStatus status;
+    auto reader = MayaCacheReader::open(file, status);
+
+    ASSERT_TRUE(reader) << status.GetErrorString();
+    EXPECT_EQ(readAt(*reader, 12 / 24.0)[0], 12.0);
 }
 
 TEST(MayaCache, SurvivesChangedBytes) {
