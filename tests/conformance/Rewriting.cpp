@@ -6,7 +6,6 @@
 
 #include <fbxsdk.h>
 
-#include <cstdlib>
 #include <memory>
 #include <stdexcept>
 
@@ -18,13 +17,6 @@ namespace fs = std::filesystem;
 struct ManagerDeleter {
     void operator()(FbxManager* manager) const { manager->Destroy(); }
 };
-
-fs::path newFolder() {
-    std::string name = (fs::temp_directory_path() / "tarnell-rewritten-XXXXXX").string();
-    if (!mkdtemp(name.data()))
-        throw std::runtime_error("no folder can be made for rewritten files");
-    return name;
-}
 
 int writerFor(FbxManager& manager, bool ascii) {
     const FbxIOPluginRegistry& registry = *manager.GetIOPluginRegistry();
@@ -46,19 +38,14 @@ std::optional<WrittenForm> parseWrittenForm(const std::string& text) {
 }
 
 RewrittenCorpus::RewrittenCorpus(const fs::path& corpus, WrittenForm form)
-    : mSource(corpus / "fbx"), mFolder(newFolder()), mForm(std::move(form)) {
+    : mSource(corpus / "fbx"), mForm(std::move(form)) {
     for (const fs::directory_entry& entry : fs::recursive_directory_iterator(mSource)) {
-        const fs::path target = mFolder / fs::relative(entry.path(), mSource);
+        const fs::path target = mFolder.file(fs::relative(entry.path(), mSource).string());
         if (entry.is_directory())
             fs::create_directories(target);
         else if (entry.path().extension() != ".fbx")
             fs::create_symlink(fs::absolute(entry.path()), target);
     }
-}
-
-RewrittenCorpus::~RewrittenCorpus() {
-    std::error_code ignored;
-    fs::remove_all(mFolder, ignored);
 }
 
 std::optional<CorpusFile> RewrittenCorpus::rewrite(const CorpusFile& file) const {
@@ -70,7 +57,7 @@ std::optional<CorpusFile> RewrittenCorpus::rewrite(const CorpusFile& file) const
         return std::nullopt;
 
     CorpusFile copy = file;
-    copy.path = mFolder / fs::relative(file.path, mSource);
+    copy.path = mFolder.file(fs::relative(file.path, mSource).string());
     FbxExporter* exporter = FbxExporter::Create(manager.get(), "");
     const bool written = exporter->SetFileExportVersion(mForm.version.c_str()) &&
                          exporter->Initialize(copy.path.c_str(), writerFor(*manager, mForm.ascii)) &&

@@ -4,6 +4,7 @@
 // Files of the corpus, read and written anew: in another version and encoding, in a folder of their own.
 #pragma once
 
+#include "../support/TemporaryFolder.h"
 #include "Corpus.h"
 
 #include <optional>
@@ -23,9 +24,6 @@ class RewrittenCorpus {
 public:
     /// What lies beside the files of the corpus, like point caches, is found from the new folder, too.
     RewrittenCorpus(const std::filesystem::path& corpus, WrittenForm form);
-    ~RewrittenCorpus();
-    RewrittenCorpus(const RewrittenCorpus&) = delete;
-    RewrittenCorpus& operator=(const RewrittenCorpus&) = delete;
 
     /// The same file, written anew; nothing when it cannot be read.
     /// Throws std::runtime_error when it is read, but cannot be written.
@@ -33,7 +31,7 @@ public:
 
 private:
     std::filesystem::path mSource;
-    std::filesystem::path mFolder;
+    support::TemporaryFolder mFolder;
     WrittenForm mForm;
 };
 

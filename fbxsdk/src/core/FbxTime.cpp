@@ -108,7 +108,7 @@ Wide wide(FbxLongLong ticks) { return ticks; }
 
 /// The ticks of so many seconds, 0 of NaN. The product of the seconds' mantissa with the ticks of a second is exact, so
 /// that nothing is rounded but the last: to the nearest tick, halves away from zero. A time is set for every sample,
-/// and long double takes ten times as long.
+/// and long double takes many times as long.
 FbxLongLong ticksOfSeconds(double seconds) {
     constexpr double kTooMany = 268435456.0; // 2^28, which is more ticks than there are
     if (!(std::abs(seconds) < kTooMany)) {
