@@ -28,6 +28,7 @@ namespace Tarnell::Fbx {
 
 namespace detail {
 class FrameTimes;
+class MemoryAccount;
 class PropertySampler;
 } // namespace detail
 
@@ -381,8 +382,10 @@ private:
     fbxsdk::FbxManager* mManager = nullptr; // owned
     fbxsdk::FbxScene* mScene = nullptr;     // the manager's
     fbxsdk::FbxAnimStack* mCurrentAnimStack = nullptr;
-    std::int64_t mSamplesLeft;        // of a list's share; without an end outside of lists
-    std::int64_t mSamplesOfFiles = 0; // that a list may hold; 0: no file was loaded
+    std::int64_t mSamplesLeft;                      // of a list's share; without an end outside of lists
+    std::int64_t mSamplesOfFiles = 0;               // that a list may hold; 0: no file was loaded
+    std::string mFileName;                          // of the file that was loaded last; empty: none
+    std::unique_ptr<detail::MemoryAccount> mMemory; // of the list that is being read
     std::unique_ptr<detail::FrameTimes> mFrameTimes;
 };
 

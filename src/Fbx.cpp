@@ -5,13 +5,14 @@
 #include "Fbx.h"
 
 #include "FbxSdk.h"
-#include "LastError.h"
+#include "calls/LastError.h"
 
 #include <algorithm>
 #include <cstddef>
 
 namespace Tarnell::Fbx {
 
+using detail::CallScope;
 using detail::fail;
 using detail::succeed;
 
@@ -43,6 +44,7 @@ constexpr ReaderRow<TnFbxTransform> kReader<TnFbxTransform> = {&FbxSdk::getNumbe
 
 template <class Object>
 bool read(const Fbx& fbx, TnFbxReadInfo& info, Object** objects, int& count) {
+    const CallScope call;
     if (objects == nullptr) {
         return fail("no place for the array of objects");
     }
@@ -80,6 +82,7 @@ Fbx::~Fbx() = default;
 Fbx& Fbx::operator=(const Fbx& /*other*/) = default;
 
 bool Fbx::loadScene(const std::string& fileName, FbxSdk& sdk) const {
+    const CallScope call;
     if (fileName.empty()) {
         return fail("no file name is given");
     }
@@ -110,6 +113,7 @@ int Fbx::getNumberOfObjects(int count, bool allObjects, int nodeTypeMask, const 
 
 bool Fbx::getAnimationStackNodeNames(const char* fileName, long nodeTypeMask, std::vector<std::string>& stackNames,
                                      std::vector<std::string>& nodeNames) const {
+    const CallScope call;
     FbxSdk sdk;
     if (!loadScene(fileName != nullptr ? fileName : "", sdk)) {
         return false;
@@ -120,6 +124,7 @@ bool Fbx::getAnimationStackNodeNames(const char* fileName, long nodeTypeMask, st
 }
 
 bool Fbx::getAnimationFrameRange(const char* fileName, float& start, float& end) const {
+    const CallScope call;
     FbxSdk sdk;
     if (!loadScene(fileName != nullptr ? fileName : "", sdk)) {
         return false;
@@ -156,6 +161,7 @@ bool Fbx::getTransforms(TnFbxReadInfo& info, TnFbxTransform** objects, int& coun
 bool Fbx::writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
                     const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                     const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const {
+    const CallScope call;
     if (info.getFileName().empty()) {
         return fail("the write options name no file");
     }

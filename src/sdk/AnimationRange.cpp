@@ -4,10 +4,10 @@
 // The time that a scene's animation covers: that of its keys, or, without any, that of its Maya point caches.
 #include "FbxSdk.h"
 
-#include "LastError.h"
 #include "NodeWalk.h"
 #include "PointCacheScope.h"
 #include "PropertySampling.h"
+#include "calls/LastError.h"
 
 #include <algorithm>
 #include <limits>

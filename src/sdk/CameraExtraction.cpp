@@ -4,8 +4,8 @@
 // Cameras: placement, aim, lens and film of a node's camera attribute, sampled, and of a producer camera, as it stands.
 #include "FbxSdk.h"
 
-#include "LastError.h"
 #include "PropertySampling.h"
+#include "calls/LastError.h"
 
 #include <algorithm>
 #include <array>

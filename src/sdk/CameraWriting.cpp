@@ -4,7 +4,7 @@
 // From a camera to a node's camera attribute: film, planes and lens, static and keyed.
 #include "CurveWriting.h"
 
-#include "LastError.h"
+#include "calls/LastError.h"
 
 namespace Tarnell::Fbx {
 

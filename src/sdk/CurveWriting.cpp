@@ -4,8 +4,8 @@
 // Curves, and the channels that every object has: position, rotation and scale of its node. Nulls have no others.
 #include "CurveWriting.h"
 
-#include "LastError.h"
 #include "PropertySampling.h"
+#include "calls/LastError.h"
 
 namespace Tarnell::Fbx {
 

@@ -4,7 +4,7 @@
 // From the scene to a file: which writer, which version, and one export.
 #include "FbxSdk.h"
 
-#include "LastError.h"
+#include "calls/LastError.h"
 
 #include <iterator>
 #include <utility>
@@ -59,6 +59,7 @@ int findWriter(const fbxsdk::FbxIOPluginRegistry& registry, const char* word) {
 } // namespace
 
 bool FbxSdk::saveScene(const TnFbxWriteInfo& info) {
+    const detail::CallScope call;
     return saveScene(mManager, mScene, info.getFileName(), info.getFileFormat(), info.getCompatibilityVersion(),
                      /*embedMedia*/ false);
 }

@@ -4,8 +4,8 @@
 // Lights, markers and nulls: a transform and a few properties of the node's attribute each.
 #include "FbxSdk.h"
 
-#include "LastError.h"
 #include "PropertySampling.h"
+#include "calls/LastError.h"
 
 namespace Tarnell::Fbx {
 

@@ -4,8 +4,8 @@
 // From a light to a node's light attribute: colour, intensity, cone and decay, static and keyed.
 #include "CurveWriting.h"
 
-#include "LastError.h"
 #include "PropertySampling.h"
+#include "calls/LastError.h"
 
 #include <array>
 

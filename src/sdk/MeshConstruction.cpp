@@ -4,7 +4,7 @@
 // A node with a new mesh: points, polygons, and one layer with what the polygon vertices carry.
 #include "FbxSdk.h"
 
-#include "LastError.h"
+#include "calls/LastError.h"
 
 #include <algorithm>
 #include <limits>

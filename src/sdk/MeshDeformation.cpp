@@ -6,9 +6,9 @@
 #include "FbxSdk.h"
 
 #include "BlendShapeWeights.h"
-#include "LastError.h"
 #include "PropertySampling.h"
 #include "SkinClusters.h"
+#include "calls/LastError.h"
 
 #include <algorithm>
 #include <memory>

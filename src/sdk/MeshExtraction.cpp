@@ -4,9 +4,9 @@
 // A mesh at one frame: layout, points, and what its layers say about every corner of its polygons.
 #include "FbxSdk.h"
 
-#include "LastError.h"
 #include "LayerReading.h"
 #include "PropertySampling.h"
+#include "calls/LastError.h"
 
 #include "model/MeshArrays.h"
 

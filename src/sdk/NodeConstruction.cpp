@@ -4,7 +4,7 @@
 // Nodes with a new camera, light or null, and the two objects that surfaces are made of: textures and materials.
 #include "FbxSdk.h"
 
-#include "LastError.h"
+#include "calls/LastError.h"
 
 namespace Tarnell::Fbx {
 

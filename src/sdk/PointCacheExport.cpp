@@ -5,8 +5,8 @@
 // frame.
 #include "FbxSdk.h"
 
-#include "LastError.h"
 #include "PointCachePlace.h"
+#include "calls/LastError.h"
 #include "model/FrameArithmetic.h"
 
 #include <cstdint>

@@ -5,7 +5,7 @@
 // object.
 #include "FbxSdk.h"
 
-#include "LastError.h"
+#include "calls/LastError.h"
 #include "model/FrameArithmetic.h"
 
 #include <cmath>
@@ -73,6 +73,7 @@ void addNodes(fbxsdk::FbxNode& root, const std::vector<Object*>& objects, MakeNo
 bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
                          const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                          const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) {
+    const detail::CallScope call;
     if (!mInitialized || mManager == nullptr || mScene == nullptr) {
         return fail("the FBX manager is not initialised");
     }

@@ -6,11 +6,12 @@
 // The six kinds of objects differ by a row: which nodes they are, and what reads one. Everything else is one walk.
 #include "FbxSdk.h"
 
-#include "LastError.h"
 #include "NodeGeometry.h"
 #include "NodeWalk.h"
 #include "PointCacheScope.h"
 #include "SampleRange.h"
+#include "calls/LastError.h"
+#include "calls/MemoryLimit.h"
 
 #include <algorithm>
 #include <cstdint>
@@ -306,12 +307,14 @@ bool FbxSdk::getNodeNamesRecursive(fbxsdk::FbxNode* node, long mask, std::vector
 
 template <class Object>
 bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
+    const detail::CallScope call;
     if (objects == nullptr || count < 1) {
         return fail("no array to read into");
     }
     if (!mInitialized || mScene == nullptr) {
         return fail("no scene is loaded");
     }
+    mMemory->begin();
     const SampleShare share(mSamplesLeft, mSamplesOfFiles > 0 ? mSamplesOfFiles : kMaxSamplesPerList);
     TnFbxTime time;
     getGlobalAnimationStackTime(time, info.getFrame(), info.getUseSampleFPS(), info.getSampleFPS());
@@ -331,6 +334,9 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     fbxsdk::FbxNode* root = mScene->GetRootNode();
     for (int i = 0; root != nullptr && result && !found && i < root->GetChildCount(); ++i) {
         result = walkSubtree(*this, walk, root->GetChild(i));
+    }
+    if (result && mMemory->exceeded()) {
+        return fail((mFileName.empty() ? "" : mFileName + ": ") + mMemory->describe());
     }
     return result;
 }

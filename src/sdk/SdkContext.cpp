@@ -6,10 +6,11 @@
 #include "FbxSdk.h"
 
 #include "FrameTimes.h"
-#include "LastError.h"
 #include "NodeWalk.h"
 #include "PropertySampling.h"
 #include "SampleRange.h"
+#include "calls/LastError.h"
+#include "calls/MemoryLimit.h"
 #include "model/FrameArithmetic.h"
 
 #include <algorithm>
@@ -99,7 +100,9 @@ std::int64_t samplesForFile(const std::string& fileName) {
 
 } // namespace
 
-FbxSdk::FbxSdk() : mSamplesLeft(detail::kUnlimitedSamples), mFrameTimes(std::make_unique<detail::FrameTimes>()) {}
+FbxSdk::FbxSdk()
+    : mSamplesLeft(detail::kUnlimitedSamples), mMemory(std::make_unique<detail::MemoryAccount>()),
+      mFrameTimes(std::make_unique<detail::FrameTimes>()) {}
 
 FbxSdk::~FbxSdk() {
     mInitialized = false;
@@ -131,6 +134,7 @@ bool FbxSdk::destroyFbxSdkManager() {
     }
     destroySdkObjects(&mManager);
     mScene = nullptr; // both died with the manager
+    mFileName.clear();
     mSamplesOfFiles = 0;
     mCurrentAnimStack = nullptr;
     mInitialized = false;
@@ -183,6 +187,7 @@ bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, con
 }
 
 bool FbxSdk::loadScene(const std::string& fileName, bool convertGeometry) {
+    const detail::CallScope call;
     if (!mInitialized) {
         return fail(fileName + ": the FBX manager is not initialised");
     }
@@ -195,6 +200,7 @@ bool FbxSdk::loadScene(const std::string& fileName, bool convertGeometry) {
         convertNurbsAndPatchRecursive(mManager, mScene->GetRootNode());
     }
     initCreateAnimationStack();
+    mFileName = fileName;
     mSamplesOfFiles = std::min(mSamplesOfFiles + samplesForFile(fileName), kMaxSamplesPerList);
     return succeed();
 }

@@ -5,9 +5,9 @@
 // by frame; and the two numberings of rotation orders.
 #include "FbxSdk.h"
 
-#include "LastError.h"
 #include "NodeGeometry.h"
 #include "PropertySampling.h"
+#include "calls/LastError.h"
 
 #include <array>
 #include <cmath>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How the facade and the adapter note the outcome of an operation for `lastError()`.
+// How the facade and the adapter note the outcome of an operation for `lastError()` and `lastWarnings()`.
 #pragma once
 
 #include <string>
@@ -17,5 +17,17 @@ bool failAbout(const std::string& fileName, const char* reason, const char* stan
 
 /// Forgets the last failure. Always true.
 bool succeed();
+
+/// Adds a sentence to the warnings of the call, unless it is among them already.
+void warn(std::string sentence);
+
+/// One call of the host's: the warnings start anew with the outermost one of a thread.
+class CallScope {
+public:
+    CallScope();
+    ~CallScope();
+    CallScope(const CallScope&) = delete;
+    CallScope& operator=(const CallScope&) = delete;
+};
 
 } // namespace Tarnell::Fbx::detail

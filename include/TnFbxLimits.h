@@ -1,0 +1,23 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// How much one call may hand out.
+#pragma once
+
+#include "TnFbxExport.h"
+
+#include <cstdint>
+
+namespace Tarnell::Fbx {
+
+/// The bytes that the objects of one call may take, samples and mesh arrays included; what loading a file takes is not
+/// counted. A call that would hand out more fails, and `lastError()` says how much it would have been.
+///
+/// One value for the whole process, which any thread may read and set at any time; a call that has begun keeps the one
+/// it began with. At first half of the machine's memory.
+TARNELL_FBX_API std::uint64_t memoryLimit();
+
+/// 0 restores the default.
+TARNELL_FBX_API void setMemoryLimit(std::uint64_t bytes);
+
+} // namespace Tarnell::Fbx
