@@ -1,12 +1,13 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a benchmark program prints for compare.py: the answer, to be proven equal, and the time that it took.
+// What a benchmark program prints for the scripts: the answer, to be proven equal, and what it cost.
 #pragma once
 
 #include <algorithm>
 #include <array>
 #include <chrono>
+#include <cstdint>
 #include <cstdio>
 #include <limits>
 
@@ -30,6 +31,24 @@ private:
     static constexpr double kMost = std::numeric_limits<double>::max();
 };
 
+/// What one call cost.
+struct Cost {
+    double seconds = std::numeric_limits<double>::infinity();
+    std::uint64_t allocations = 0; ///< calls of malloc, calloc, realloc and their like, by anything in the process
+};
+
+/// Allocations of the process so far. The benchmark programs define malloc and its like for this (Allocations.cpp).
+std::uint64_t allocationCount();
+
+/// From here to the end of the scope, valgrind's callgrind counts instructions; without it nothing happens.
+class CountedInstructions {
+public:
+    CountedInstructions();
+    ~CountedInstructions();
+    CountedInstructions(const CountedInstructions&) = delete;
+    CountedInstructions& operator=(const CountedInstructions&) = delete;
+};
+
 class Stopwatch {
 public:
     [[nodiscard]] double seconds() const {
@@ -40,11 +59,31 @@ private:
     std::chrono::steady_clock::time_point mStart = std::chrono::steady_clock::now();
 };
 
-inline void print(const Answer& answer, double seconds) {
-    std::printf(
-        "{\"count\": %lld, \"minimum\": [%.9g, %.9g, %.9g], \"maximum\": [%.9g, %.9g, %.9g], \"seconds\": %.6f}\n",
-        answer.count, answer.minimum[0], answer.minimum[1], answer.minimum[2], answer.maximum[0], answer.maximum[1],
-        answer.maximum[2], seconds);
+/// The cost of the work, from its start to its end.
+template <class Work>
+Cost measure(const Work& work) {
+    const std::uint64_t allocated = allocationCount();
+    const Stopwatch watch;
+    {
+        const CountedInstructions counted;
+        work();
+    }
+    return {watch.seconds(), allocationCount() - allocated};
+}
+
+/// The less expensive of two runs of the same work: the machine only ever adds to what it takes.
+inline Cost cheaper(const Cost& a, const Cost& b) { return a.seconds <= b.seconds ? a : b; }
+
+inline void print(const Cost& cost) {
+    std::printf("\"seconds\": %.6f, \"allocations\": %llu}\n", cost.seconds,
+                static_cast<unsigned long long>(cost.allocations));
+}
+
+inline void print(const Answer& answer, const Cost& cost) {
+    std::printf("{\"count\": %lld, \"minimum\": [%.9g, %.9g, %.9g], \"maximum\": [%.9g, %.9g, %.9g], ", answer.count,
+                answer.minimum[0], answer.minimum[1], answer.minimum[2], answer.maximum[0], answer.maximum[1],
+                answer.maximum[2]);
+    print(cost);
 }
 
 } // namespace bench

@@ -4,50 +4,71 @@
 // The numbers of the scenes that both programs write: a hilly grid of quads, and nodes that circle.
 #pragma once
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 
 namespace bench {
 
-constexpr int kGridColumns = 1000, kGridRows = 500; ///< quads; four polygon vertices each, two million in all
-constexpr int kGridQuads = kGridColumns * kGridRows;
-constexpr int kGridPoints = (kGridColumns + 1) * (kGridRows + 1);
-
-constexpr int kWrittenNodes = 500;
-constexpr int kWrittenFrames = 2000;
 constexpr int kWrittenFramesPerSecond = 24;
 
-/// The place of a point in the grid, row by row.
-inline std::array<float, 3> gridPoint(int point) {
-    const auto x = static_cast<float>(point % (kGridColumns + 1)), z = static_cast<float>(point / (kGridColumns + 1));
-    return {x * 0.1f, std::sin(x * 0.013f) * std::cos(z * 0.017f) * 7.0f, z * 0.1f};
-}
+/// A grid of quads with four polygon vertices each, two million in all.
+struct Grid {
+    int columns = 1000;
+    int rows = 500;
 
-/// The point at a corner of a quad.
-inline int gridCorner(int quad, int corner) {
-    constexpr std::array<int, 4> kSteps = {0, kGridColumns + 1, kGridColumns + 2, 1};
-    return quad / kGridColumns * (kGridColumns + 1) + quad % kGridColumns + kSteps[static_cast<std::size_t>(corner)];
-}
+    int quads() const { return columns * rows; }
+    int points() const { return (columns + 1) * (rows + 1); }
 
-inline std::array<float, 3> gridNormal(int point) {
-    const std::array<float, 3> place = gridPoint(point);
-    const float x = std::cos(place[0]) * 0.3f, z = std::sin(place[2]) * 0.3f;
-    return {x, std::sqrt(1.0f - x * x - z * z), z};
-}
+    /// The place of a point in the grid, row by row.
+    std::array<float, 3> point(int index) const {
+        const auto x = static_cast<float>(index % (columns + 1)), z = static_cast<float>(index / (columns + 1));
+        return {x * 0.1f, std::sin(x * 0.013f) * std::cos(z * 0.017f) * 7.0f, z * 0.1f};
+    }
 
-inline std::array<float, 2> gridTextureCoordinate(int point) {
-    const std::array<float, 3> place = gridPoint(point);
-    return {place[0] / (0.1f * kGridColumns), place[2] / (0.1f * kGridRows)};
-}
+    /// The point at a corner of a quad.
+    int corner(int quad, int corner) const {
+        const std::array<int, 4> steps = {0, columns + 1, columns + 2, 1};
+        return quad / columns * (columns + 1) + quad % columns + steps[static_cast<std::size_t>(corner)];
+    }
 
-inline std::array<float, 3> nodePosition(int node, int frame) {
-    const float angle = static_cast<float>(frame) * 0.01f + static_cast<float>(node);
-    return {std::cos(angle) * 100.0f, static_cast<float>(node) * 0.5f, std::sin(angle) * 100.0f};
-}
+    std::array<float, 3> normal(int index) const {
+        const std::array<float, 3> place = point(index);
+        const float x = std::cos(place[0]) * 0.3f, z = std::sin(place[2]) * 0.3f;
+        return {x, std::sqrt(1.0f - x * x - z * z), z};
+    }
 
-/// About the Y axis, in degrees.
-inline float nodeTurn(int node, int frame) {
-    return static_cast<float>(frame % 360) * 0.4f + static_cast<float>(node % 7);
+    std::array<float, 2> textureCoordinate(int index) const {
+        const std::array<float, 3> place = point(index);
+        return {place[0] / (0.1f * static_cast<float>(columns)), place[2] / (0.1f * static_cast<float>(rows))};
+    }
+};
+
+/// Nodes side by side, each with a position and a rotation on every frame.
+struct CirclingNodes {
+    int nodes = 500;
+    int frames = 2000;
+
+    static std::array<float, 3> position(int node, int frame) {
+        const float angle = static_cast<float>(frame) * 0.01f + static_cast<float>(node);
+        return {std::cos(angle) * 100.0f, static_cast<float>(node) * 0.5f, std::sin(angle) * 100.0f};
+    }
+
+    /// About the Y axis, in degrees.
+    static float turn(int node, int frame) {
+        return static_cast<float>(frame % 360) * 0.4f + static_cast<float>(node % 7);
+    }
+};
+
+/// 1 is what the tables show; smaller scales are for counting instructions.
+inline int scaled(int number, double scale) { return std::max(2, static_cast<int>(number * scale)); }
+inline Grid scaledGrid(double scale) {
+    const Grid full;
+    return {scaled(full.columns, std::sqrt(scale)), scaled(full.rows, std::sqrt(scale))};
+}
+inline CirclingNodes scaledNodes(double scale) {
+    const CirclingNodes full;
+    return {scaled(full.nodes, std::sqrt(scale)), scaled(full.frames, std::sqrt(scale))};
 }
 
 } // namespace bench

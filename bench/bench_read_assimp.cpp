@@ -60,9 +60,8 @@ int main(int argc, char** argv) {
     }
     const std::string mode = argv[1];
     Assimp::Importer importer;
-    const bench::Stopwatch watch;
-    const aiScene* scene = importer.ReadFile(argv[2], 0);
-    const double seconds = watch.seconds();
+    const aiScene* scene = nullptr;
+    const bench::Cost cost = bench::measure([&] { scene = importer.ReadFile(argv[2], 0); });
     if (scene == nullptr) {
         std::fprintf(stderr, "bench_read_assimp: %s\n", importer.GetErrorString());
         return 1;
@@ -74,6 +73,6 @@ int main(int argc, char** argv) {
         addCameras(*scene, answer);
     else
         addTransforms(*scene, answer);
-    bench::print(answer, seconds);
+    bench::print(answer, cost);
     return 0;
 }

@@ -11,6 +11,7 @@
 #include <TnFbxReadInfo.h>
 #include <TnFbxTransform.h>
 
+#include <cstdlib>
 #include <cstring>
 #include <memory>
 #include <string>
@@ -27,14 +28,13 @@ TnFbxReadInfo infoFor(const char* fileName) {
 }
 
 /// Polygon vertices and the box around the points, in the mesh's own space.
-bool readMeshes(const char* fileName, bench::Answer& answer, double& seconds) {
+bool readMeshes(const char* fileName, bench::Answer& answer, bench::Cost& cost) {
     TnFbxReadInfo info = infoFor(fileName);
     info.setTransformPoints(false);
     TnFbxMesh* meshes = nullptr;
     int count = 0;
-    const bench::Stopwatch watch;
-    const bool success = Fbx().getMeshes(info, &meshes, count);
-    seconds = watch.seconds();
+    bool success = false;
+    cost = bench::measure([&] { success = Fbx().getMeshes(info, &meshes, count); });
     const std::unique_ptr<TnFbxMesh[]> owner(meshes);
     for (int i = 0; i < count; ++i) {
         answer.count += meshes[i].getNumberOfPolygonVertices();
@@ -48,14 +48,13 @@ bool readMeshes(const char* fileName, bench::Answer& answer, double& seconds) {
 }
 
 /// The file's own cameras (the library adds seven viewing cameras) and the box around their positions.
-bool readCameras(const char* fileName, bench::Answer& answer, double& seconds) {
+bool readCameras(const char* fileName, bench::Answer& answer, bench::Cost& cost) {
     constexpr int kProducerCameras = 7;
     TnFbxReadInfo info = infoFor(fileName);
     TnFbxCamera* cameras = nullptr;
     int count = 0;
-    const bench::Stopwatch watch;
-    const bool success = Fbx().getCameras(info, &cameras, count);
-    seconds = watch.seconds();
+    bool success = false;
+    cost = bench::measure([&] { success = Fbx().getCameras(info, &cameras, count); });
     const std::unique_ptr<TnFbxCamera[]> owner(cameras);
     for (int i = kProducerCameras; i < count; ++i) {
         ++answer.count;
@@ -70,15 +69,14 @@ bool readCameras(const char* fileName, bench::Answer& answer, double& seconds) {
 }
 
 /// The nodes, and the box around their positions at the frames that carry keys.
-bool readTransforms(const char* fileName, bool global, bench::Answer& answer, double& seconds) {
+bool readTransforms(const char* fileName, bool global, bench::Answer& answer, bench::Cost& cost) {
     constexpr int kFramesPerKey = 5;
     TnFbxReadInfo info = infoFor(fileName);
     info.setGlobalTransform(global);
     TnFbxTransform* transforms = nullptr;
     int count = 0;
-    const bench::Stopwatch watch;
-    const bool success = Fbx().getTransforms(info, &transforms, count);
-    seconds = watch.seconds();
+    bool success = false;
+    cost = bench::measure([&] { success = Fbx().getTransforms(info, &transforms, count); });
     const std::unique_ptr<TnFbxTransform[]> owner(transforms);
     answer.count = count;
     for (int i = 0; i < count; ++i) {
@@ -94,29 +92,35 @@ bool readTransforms(const char* fileName, bool global, bench::Answer& answer, do
     return success;
 }
 
-bool readMode(const std::string& mode, const char* fileName, bench::Answer& answer, double& seconds) {
+bool readMode(const std::string& mode, const char* fileName, bench::Answer& answer, bench::Cost& cost) {
     if (mode == "mesh")
-        return readMeshes(fileName, answer, seconds);
+        return readMeshes(fileName, answer, cost);
     if (mode == "cameras")
-        return readCameras(fileName, answer, seconds);
+        return readCameras(fileName, answer, cost);
     if (mode == "local")
-        return readTransforms(fileName, /*global*/ false, answer, seconds);
-    return readTransforms(fileName, /*global*/ true, answer, seconds);
+        return readTransforms(fileName, /*global*/ false, answer, cost);
+    return readTransforms(fileName, /*global*/ true, answer, cost);
 }
 
 } // namespace
 
 int main(int argc, char** argv) {
-    if (argc != 3) {
-        std::fputs("usage: bench_read_tarnell mesh|cameras|local|global FILE\n", stderr);
+    if (argc < 3 || argc > 4) {
+        std::fputs("usage: bench_read_tarnell mesh|cameras|local|global FILE [REPETITIONS]\n", stderr);
         return 2;
     }
+    const int repetitions = argc == 4 ? std::atoi(argv[3]) : 1;
     bench::Answer answer;
-    double seconds = 0;
-    if (!readMode(argv[1], argv[2], answer, seconds)) {
-        std::fprintf(stderr, "bench_read_tarnell: %s\n", lastError().c_str());
-        return 1;
+    bench::Cost best;
+    for (int i = 0; i < repetitions; ++i) {
+        answer = {};
+        bench::Cost cost;
+        if (!readMode(argv[1], argv[2], answer, cost)) {
+            std::fprintf(stderr, "bench_read_tarnell: %s\n", lastError().c_str());
+            return 1;
+        }
+        best = bench::cheaper(best, cost);
     }
-    bench::print(answer, seconds);
+    bench::print(answer, best);
     return 0;
 }

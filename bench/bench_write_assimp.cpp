@@ -14,6 +14,9 @@
 
 namespace {
 
+constexpr bench::Grid kGrid;
+constexpr bench::CirclingNodes kNodes;
+
 aiVector3D vector(const std::array<float, 3>& numbers) { return {numbers[0], numbers[1], numbers[2]}; }
 
 /// A mesh as assimp has it: a vertex for every corner.
@@ -21,22 +24,22 @@ aiMesh* gridMesh() {
     auto mesh = std::make_unique<aiMesh>();
     mesh->mName = "grid";
     mesh->mPrimitiveTypes = aiPrimitiveType_POLYGON;
-    mesh->mNumVertices = bench::kGridQuads * 4;
+    mesh->mNumVertices = static_cast<unsigned>(kGrid.quads()) * 4;
     mesh->mVertices = new aiVector3D[mesh->mNumVertices];
     mesh->mNormals = new aiVector3D[mesh->mNumVertices];
     mesh->mTextureCoords[0] = new aiVector3D[mesh->mNumVertices];
     mesh->mNumUVComponents[0] = 2;
-    mesh->mNumFaces = bench::kGridQuads;
+    mesh->mNumFaces = static_cast<unsigned>(kGrid.quads());
     mesh->mFaces = new aiFace[mesh->mNumFaces];
-    for (int quad = 0; quad < bench::kGridQuads; ++quad) {
+    for (int quad = 0; quad < kGrid.quads(); ++quad) {
         aiFace& face = mesh->mFaces[quad];
         face.mNumIndices = 4;
         face.mIndices = new unsigned[4];
         for (int corner = 0; corner < 4; ++corner) {
-            const int at = quad * 4 + corner, point = bench::gridCorner(quad, corner);
-            const auto uv = bench::gridTextureCoordinate(point);
-            mesh->mVertices[at] = vector(bench::gridPoint(point));
-            mesh->mNormals[at] = vector(bench::gridNormal(point));
+            const int at = quad * 4 + corner, point = kGrid.corner(quad, corner);
+            const auto uv = kGrid.textureCoordinate(point);
+            mesh->mVertices[at] = vector(kGrid.point(point));
+            mesh->mNormals[at] = vector(kGrid.normal(point));
             mesh->mTextureCoords[0][at] = {uv[0], uv[1], 0.0f};
             face.mIndices[corner] = static_cast<unsigned>(at);
         }
@@ -63,15 +66,16 @@ void addMesh(aiScene& scene) {
 aiNodeAnim* movement(int node) {
     auto channel = std::make_unique<aiNodeAnim>();
     channel->mNodeName = "node" + std::to_string(node);
-    channel->mNumPositionKeys = channel->mNumRotationKeys = bench::kWrittenFrames;
+    channel->mNumPositionKeys = channel->mNumRotationKeys = static_cast<unsigned>(kNodes.frames);
     channel->mPositionKeys = new aiVectorKey[channel->mNumPositionKeys];
     channel->mRotationKeys = new aiQuatKey[channel->mNumRotationKeys];
     channel->mNumScalingKeys = 1;
     channel->mScalingKeys = new aiVectorKey[1]{{0.0, {1.0f, 1.0f, 1.0f}}};
-    for (int frame = 0; frame < bench::kWrittenFrames; ++frame) {
+    for (int frame = 0; frame < kNodes.frames; ++frame) {
         constexpr float kHalfDegree = static_cast<float>(M_PI / 360.0);
-        const float half = bench::nodeTurn(node, frame) * kHalfDegree;
-        channel->mPositionKeys[frame] = {static_cast<double>(frame), vector(bench::nodePosition(node, frame))};
+        const float half = bench::CirclingNodes::turn(node, frame) * kHalfDegree;
+        channel->mPositionKeys[frame] = {static_cast<double>(frame),
+                                         vector(bench::CirclingNodes::position(node, frame))};
         channel->mRotationKeys[frame] = {static_cast<double>(frame), {std::cos(half), 0.0f, std::sin(half), 0.0f}};
     }
     return channel.release();
@@ -79,15 +83,15 @@ aiNodeAnim* movement(int node) {
 
 void addNodes(aiScene& scene) {
     aiNode& root = *scene.mRootNode;
-    root.mNumChildren = bench::kWrittenNodes;
-    root.mChildren = new aiNode*[bench::kWrittenNodes];
+    root.mNumChildren = static_cast<unsigned>(kNodes.nodes);
+    root.mChildren = new aiNode*[kNodes.nodes];
     auto animation = std::make_unique<aiAnimation>();
     animation->mName = "Take 001";
     animation->mTicksPerSecond = bench::kWrittenFramesPerSecond;
-    animation->mDuration = bench::kWrittenFrames - 1;
-    animation->mNumChannels = bench::kWrittenNodes;
-    animation->mChannels = new aiNodeAnim*[bench::kWrittenNodes];
-    for (int i = 0; i < bench::kWrittenNodes; ++i) {
+    animation->mDuration = kNodes.frames - 1;
+    animation->mNumChannels = static_cast<unsigned>(kNodes.nodes);
+    animation->mChannels = new aiNodeAnim*[kNodes.nodes];
+    for (int i = 0; i < kNodes.nodes; ++i) {
         root.mChildren[i] = newNode("node" + std::to_string(i), &root);
         animation->mChannels[i] = movement(i);
     }
@@ -113,13 +117,14 @@ int main(int argc, char** argv) {
         addNodes(scene);
 
     Assimp::Exporter exporter;
-    const bench::Stopwatch watch;
-    const aiReturn result = exporter.Export(&scene, mode.ends_with("Ascii") ? "fbxa" : "fbx", argv[2]);
-    const double seconds = watch.seconds();
+    aiReturn result = aiReturn_FAILURE;
+    const bench::Cost cost =
+        bench::measure([&] { result = exporter.Export(&scene, mode.ends_with("Ascii") ? "fbxa" : "fbx", argv[2]); });
     if (result != aiReturn_SUCCESS) {
         std::fprintf(stderr, "bench_write_assimp: %s\n", exporter.GetErrorString());
         return 1;
     }
-    std::printf("{\"seconds\": %.6f}\n", seconds);
+    std::fputs("{", stdout);
+    bench::print(cost);
     return 0;
 }

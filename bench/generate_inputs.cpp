@@ -33,6 +33,9 @@ constexpr int kAnimatedNodes = 500;
 constexpr int kFrames = 2'000;
 constexpr int kFramesPerKey = 5;
 constexpr int kChainLength = 10;
+constexpr int kRigNodes = 156;
+constexpr int kRigControls = 5; // of a node: scalar properties with a curve each
+constexpr int kRigKeys = 33;
 
 /// The same numbers with every standard library, which its distributions do not promise.
 class Random {
@@ -242,8 +245,9 @@ void writeStack(Scene& scene, std::int64_t layer, std::int64_t ticks) {
     scene.connect(layer, stack);
 }
 
-/// A slow wave with user tangents, one key every fifth frame.
-void writeCurve(Scene& scene, std::int64_t curveNode, const std::string& channel, double amplitude, int frames) {
+/// A slow wave with user tangents, one key every few frames.
+void writeCurve(Scene& scene, std::int64_t curveNode, const std::string& channel, double amplitude, int frames,
+                int framesPerKey = kFramesPerKey) {
     constexpr std::int32_t kCubicUser = 0x408;
     constexpr std::int32_t kDefaultWeights = 218434821; // two weights of 1/3
     const double turnsPerSecond = 0.5 + 0.25 * scene.random.next();
@@ -252,9 +256,9 @@ void writeCurve(Scene& scene, std::int64_t curveNode, const std::string& channel
     std::vector<std::int64_t> times;
     std::vector<float> values;
     std::vector<std::int32_t> flags, attributes, references;
-    for (int frame = 0; frame <= frames; frame += kFramesPerKey) {
+    for (int frame = 0; frame <= frames; frame += framesPerKey) {
         const double seconds = frame / static_cast<double>(kFramesPerSecond);
-        const double nextSeconds = (frame + kFramesPerKey) / static_cast<double>(kFramesPerSecond);
+        const double nextSeconds = (frame + framesPerKey) / static_cast<double>(kFramesPerSecond);
         const auto slopeAt = [&](double t) {
             return static_cast<float>(amplitude * kTwoPi * turnsPerSecond *
                                       std::cos(kTwoPi * (turnsPerSecond * t + phase)));
@@ -284,21 +288,29 @@ void writeCurve(Scene& scene, std::int64_t curveNode, const std::string& channel
     scene.connect(id, curveNode, channel);
 }
 
-void writeAnimatedProperty(Scene& scene, std::int64_t layer, std::int64_t model, const std::string& property,
-                           const std::string& name, double amplitude, int frames) {
+const std::vector<std::string> kVectorChannels = {"d|X", "d|Y", "d|Z"};
+
+std::int64_t writeCurveNode(Scene& scene, std::int64_t layer, std::int64_t model, const std::string& property,
+                            const std::string& name, const std::vector<std::string>& channels) {
     const std::int64_t id = scene.newId();
     FbxEmitter& out = scene.out;
     out.begin("AnimationCurveNode").id(id).name(name, "AnimCurveNode").text("").block();
     out.begin("Properties70").block();
-    for (const std::string_view channel : {"d|X", "d|Y", "d|Z"}) {
+    for (const std::string& channel : channels) {
         out.begin("P").text(channel).text("Number").text("").text("A").real(0).end();
     }
     out.end();
     out.end();
     scene.connect(id, layer);
     scene.connect(id, model, property);
-    for (const std::string channel : {"d|X", "d|Y", "d|Z"})
-        writeCurve(scene, id, channel, amplitude, frames);
+    return id;
+}
+
+void writeAnimatedProperty(Scene& scene, std::int64_t layer, std::int64_t model, const std::string& property,
+                           const std::string& name, double amplitude, int frames, int framesPerKey = kFramesPerKey) {
+    const std::int64_t id = writeCurveNode(scene, layer, model, property, name, kVectorChannels);
+    for (const std::string& channel : kVectorChannels)
+        writeCurve(scene, id, channel, amplitude, frames, framesPerKey);
 }
 
 void writeAnimationFile(const std::filesystem::path& path, int nodes, int frames) {
@@ -323,6 +335,35 @@ void writeAnimationFile(const std::filesystem::path& path, int nodes, int frames
     out->save(path);
 }
 
+/// A character's rig: many nodes with all nine channels and some controls of their own, and few keys on each curve.
+void writeRigFile(const std::filesystem::path& path, int nodes, int keys) {
+    constexpr double kTranslation = 2, kDegrees = 40, kScale = 0.1, kControl = 1;
+    const int frames = (keys - 1) * kFramesPerKey;
+    const std::unique_ptr<FbxEmitter> out = makeEmitter(Encoding::binaryCompressed);
+    Scene scene{.out = *out};
+    writeHead(*out);
+    out->begin("Objects").block();
+    const std::int64_t layer = scene.newId();
+    writeStack(scene, layer, frames * (kTicksPerSecond / kFramesPerSecond));
+    std::vector<std::int64_t> models;
+    for (int i = 0; i < nodes; ++i) {
+        const std::int64_t parent = i == 0 ? 0 : models[static_cast<std::size_t>((i - 1) / 2)];
+        models.push_back(writeModel(scene, "joint" + std::to_string(i), "Null", parent, {0, 0, 0}));
+        const std::int64_t model = models.back();
+        writeAnimatedProperty(scene, layer, model, "Lcl Translation", "T", kTranslation, frames);
+        writeAnimatedProperty(scene, layer, model, "Lcl Rotation", "R", kDegrees, frames);
+        writeAnimatedProperty(scene, layer, model, "Lcl Scaling", "S", kScale, frames);
+        for (int control = 0; control < kRigControls; ++control) {
+            const std::string name = "control" + std::to_string(control);
+            const std::string channel = "d|" + name;
+            writeCurve(scene, writeCurveNode(scene, layer, model, name, name, {channel}), channel, kControl, frames);
+        }
+    }
+    out->end();
+    writeConnections(scene);
+    out->save(path);
+}
+
 void writeAll(const std::filesystem::path& folder, double scale) {
     const auto scaled = [&](int value) { return std::max(kChainLength, static_cast<int>(value * scale)); };
     std::filesystem::create_directories(folder);
@@ -332,6 +373,7 @@ void writeAll(const std::filesystem::path& folder, double scale) {
     writeMeshFile(folder / "many_meshes.fbx", Encoding::binaryCompressed, scaled(kManyMeshes),
                   kManyMeshesPolygonVertices);
     writeAnimationFile(folder / "animation.fbx", scaled(kAnimatedNodes), scaled(kFrames));
+    writeRigFile(folder / "rig.fbx", scaled(kRigNodes), kRigKeys);
 }
 
 } // namespace
