@@ -19,6 +19,24 @@ namespace {
 
 int outcome(int result) { return result < 0 ? errno : 0; }
 
+/// Opens for writing. A pipe without a reader would block: it gets some time to find one.
+int openUnlessUnread(const std::string& path) {
+    constexpr int kTries = 200;
+    constexpr timespec kPause{0, 10'000'000}; // both together two seconds
+    int file = -1;
+    for (int i = 0; i < kTries; ++i) {
+        file = ::open(path.c_str(), O_WRONLY | O_NONBLOCK | O_CLOEXEC);
+        struct stat existing {};
+        const bool waits = file < 0 && errno == ENXIO && ::stat(path.c_str(), &existing) == 0;
+        if (!waits || !S_ISFIFO(existing.st_mode)) {
+            return file;
+        }
+        ::nanosleep(&kPause, nullptr);
+    }
+    errno = ENXIO;
+    return -1;
+}
+
 /// Repeats a system call until all bytes are through. `step` gets what is left and how much went before.
 template <class Byte, class Step>
 int transferAll(std::span<Byte> bytes, const Step& step) {
@@ -87,8 +105,16 @@ int FileOperations::create(const std::string& path, unsigned permissions, int& f
 }
 
 int FileOperations::openExisting(const std::string& path, int& file) {
-    file = ::open(path.c_str(), O_WRONLY | O_CLOEXEC);
-    return outcome(file);
+    file = openUnlessUnread(path);
+    if (file < 0) {
+        return errno;
+    }
+    const int error = outcome(::fcntl(file, F_SETFL, ::fcntl(file, F_GETFL) & ~O_NONBLOCK));
+    if (error != 0) {
+        ::close(file);
+        file = -1;
+    }
+    return error;
 }
 
 int FileOperations::write(int file, std::span<const char> bytes) {

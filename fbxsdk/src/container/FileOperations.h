@@ -22,7 +22,7 @@ public:
     /// Opens a file that must not be there yet, for reading too, with the usual permissions or, unless 0, with those
     /// given.
     virtual int create(const std::string& path, unsigned permissions, int& file);
-    /// Opens a pipe or a device.
+    /// Opens a pipe or a device. A pipe is waited for until somebody reads it, but not for ever.
     virtual int openExisting(const std::string& path, int& file);
     /// Writes all bytes. A reader that went away is an error, not a signal.
     virtual int write(int file, std::span<const char> bytes);

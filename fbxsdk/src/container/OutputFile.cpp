@@ -5,6 +5,7 @@
 #include "container/OutputFile.h"
 
 #include <algorithm>
+#include <atomic>
 #include <cerrno>
 #include <filesystem>
 #include <system_error>
@@ -21,6 +22,8 @@ namespace {
 constexpr std::size_t kBufferBytes = std::size_t{1} << 18;
 /// Names that are tried for a file of our own before giving up.
 constexpr int kMostNames = 1000;
+/// Behind the last name that was given, so that thousands of files beside each other do not try each other's names.
+std::atomic<unsigned> nextName{0};
 /// Links that are followed, as many as the system follows.
 constexpr int kMostLinks = 40;
 
@@ -51,7 +54,7 @@ int tryNames(const std::string& folder, std::string& path, const Make& make) {
     // Not derived from the target's name, which may be as long as a name can be.
     const std::string prefix = folder + ".fbx-" + std::to_string(::getpid()) + "-";
     for (int i = 0; i < kMostNames; ++i) {
-        path = prefix + std::to_string(i) + ".part";
+        path = prefix + std::to_string(nextName++) + ".part";
         const int error = make();
         if (error != EEXIST) {
             return error;
@@ -59,6 +62,9 @@ int tryNames(const std::string& folder, std::string& path, const Make& make) {
     }
     return EEXIST;
 }
+
+/// What gets bytes, but cannot be replaced.
+bool isStream(const struct stat& file) { return !S_ISREG(file.st_mode) && !S_ISDIR(file.st_mode); }
 
 /// Whether the file system, or its rules, just do not let a file have two names.
 bool isWithoutLinks(int error) { return error == EPERM || error == ENOTSUP || error == ENOSYS || error == EMLINK; }
@@ -80,7 +86,10 @@ void OutputFile::report(FbxStatus& status) const {
     status.SetCode(FbxStatus::eFailure, "%s: %s", mName.c_str(), reason().c_str());
 }
 
-std::string OutputFile::reason() const { return "cannot be written: " + std::generic_category().message(mError); }
+std::string OutputFile::reason() const {
+    const bool isUnread = mDirect && mError == ENXIO;
+    return "cannot be written: " + (isUnread ? "nobody reads it" : std::generic_category().message(mError));
+}
 
 bool OutputFile::fail(int error, FbxStatus& status) {
     note(error);
@@ -93,13 +102,17 @@ bool OutputFile::open(FbxStatus& status) {
     if (mName.empty()) {
         return fail(ENOENT, status);
     }
+    struct stat existing {};
+    // Before links are followed: that of a standard stream leads to the name of no file.
+    if (::stat(mName.c_str(), &existing) == 0 && isStream(existing)) {
+        return openStream(status);
+    }
     int error = 0;
     mTarget = behindLinks(mName, error);
     if (error != 0) {
         return fail(error, status);
     }
     mFolder = folderOf(mTarget);
-    struct stat existing {};
     const bool exists = ::stat(mTarget.c_str(), &existing) == 0;
     if (exists && S_ISDIR(existing.st_mode)) {
         return fail(EISDIR, status);
@@ -108,13 +121,15 @@ bool OutputFile::open(FbxStatus& status) {
     if (exists && ::faccessat(AT_FDCWD, mTarget.c_str(), W_OK, AT_EACCESS) != 0) {
         return fail(errno, status);
     }
-    mDirect = exists && !S_ISREG(existing.st_mode);
-    if (mDirect) {
-        return true;
-    }
     constexpr mode_t kPermissions = 07777;
     error = openBeside(exists ? existing.st_mode & kPermissions : 0U);
     return error == 0 || fail(error, status);
+}
+
+bool OutputFile::openStream(FbxStatus& status) {
+    mDirect = true;
+    mTarget = mName;
+    return ::faccessat(AT_FDCWD, mTarget.c_str(), W_OK, AT_EACCESS) == 0 || fail(errno, status);
 }
 
 int OutputFile::openBeside(unsigned permissions) {
@@ -220,14 +235,21 @@ bool OutputFile::commitTogether(std::span<OutputFile* const> files, FbxStatus& s
             file->discard();
         }
     }
+    for (std::size_t i = 0; done && i < files.size(); ++i) {
+        const bool again = i + 1 < files.size() && files[i + 1]->mFolder == files[i]->mFolder;
+        if (!again && !files[i]->mDirect) {
+            files[i]->mOperations.flushFolder(files[i]->mFolder);
+        }
+    }
     return done;
 }
 
 bool OutputFile::complete(FbxStatus& status) {
-    if (!mDirect && !failed()) {
+    if (!mDirect && !mComplete && !failed()) {
         flushBuffer();
         note(failed() ? 0 : mOperations.flush(mFile));
         closeFile();
+        mComplete = true;
     }
     return !failed() || fail(mError, status);
 }
@@ -262,9 +284,6 @@ bool OutputFile::takeName(FbxStatus& status) {
 void OutputFile::forgetOld() {
     mTookName = false;
     discard();
-    if (!mDirect) {
-        mOperations.flushFolder(mFolder);
-    }
 }
 
 void OutputFile::sendDirectly() {
@@ -312,7 +331,10 @@ void OutputFile::discard() {
 
 void OutputFile::putBack() {
     if (mTookName && !mOld.empty()) {
-        mOperations.rename(mOld, mTarget);
+        // Where another file of the same name has put it back already, both names stay.
+        if (mOperations.rename(mOld, mTarget) == 0) {
+            mOperations.remove(mOld);
+        }
     } else if (mTookName && mStoodAlone) {
         mOperations.remove(mTarget);
     } else if (!mOld.empty()) {

@@ -19,7 +19,8 @@ namespace detail {
 /// after any fault, what stood there before is as it was. Without commit() nothing is left behind.
 ///
 /// A link is followed: the file that it leads to is replaced. A pipe or a device cannot be replaced; it gets the bytes
-/// in commit(), all at once. Never more than a small part of the bytes is in memory.
+/// in commit(), all at once, and a pipe that nobody reads is given up soon. Never more than a small part of the bytes
+/// is in memory.
 class OutputFile final : public ByteOutput {
 public:
     /// The operations must outlive the file.
@@ -40,10 +41,15 @@ public:
     /// Why it failed, without its name.
     [[nodiscard]] std::string reason() const;
 
-    /// Completes the file. False when that or any write before it failed; the status says why.
+    /// Puts all bytes on the medium, still under the other name. False when that or any write before it failed; the
+    /// status says why. Nothing can be written afterwards.
+    [[nodiscard]] bool complete(FbxStatus& status);
+    /// Completes the file and gives it its name.
     [[nodiscard]] bool commit(FbxStatus& status);
     /// Completes files that belong together, which appear in this order: all of them, or none and what stood there
     /// before is there again. On a file system without hard links only the last of them can fail without a trace.
+    /// Between the first name and the last nothing happens but that names change. Who is killed just then leaves some
+    /// files new and some old, each of them complete, and the old ones under second names beside them.
     [[nodiscard]] static bool commitTogether(std::span<OutputFile* const> files, FbxStatus& status);
 
 private:
@@ -53,7 +59,7 @@ private:
     void sendBuffer(std::span<const char> bytes);
     int openBeside(unsigned permissions);
     int openSpool();
-    bool complete(FbxStatus& status);
+    bool openStream(FbxStatus& status);
     bool keepOld(FbxStatus& status);
     bool takeName(FbxStatus& status);
     void forgetOld();
@@ -70,6 +76,7 @@ private:
     std::string mTemporary; ///< empty when there is none
     std::string mOld;       ///< the second name of what stood there before; empty when there is none
     bool mDirect = false;   ///< a pipe or a device
+    bool mComplete = false;
     bool mTookName = false;
     bool mStoodAlone = false; ///< nothing stood there before
     int mFile = -1;           ///< for a pipe or device that gets much: a nameless file until the end

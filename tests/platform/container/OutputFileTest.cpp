@@ -5,6 +5,7 @@
 #include "container/OutputFile.h"
 
 #include <algorithm>
+#include <array>
 #include <cerrno>
 #include <filesystem>
 #include <string>
@@ -320,6 +321,53 @@ TEST(OutputFile, FailsWithoutASignalWhenAPipeBreaks) {
     EXPECT_NE(std::string(status.GetErrorString()).find("Broken pipe"), std::string::npos) << status.GetErrorString();
 }
 
+TEST(OutputFile, GivesUpAPipeThatNobodyReads) {
+    const TemporaryFolder folder;
+    const std::string pipe = folder.file("pipe");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+    FbxStatus status;
+
+    EXPECT_FALSE(writeFile(pipe, "content", status));
+
+    EXPECT_EQ(std::string(status.GetErrorString()), pipe + ": cannot be written: nobody reads it");
+    EXPECT_TRUE(fs::is_fifo(pipe));
+}
+
+TEST(OutputFile, WritesToAStreamWhoseLinkLeadsToNoName) {
+    std::array<int, 2> ends{};
+    ASSERT_EQ(::pipe2(ends.data(), O_CLOEXEC), 0);
+
+    EXPECT_TRUE(writeFile("/proc/self/fd/" + std::to_string(ends[1]), "content"));
+
+    std::array<char, 16> received{};
+    EXPECT_EQ(::read(ends[0], received.data(), received.size()), 7);
+    EXPECT_EQ(std::string(received.data()), "content");
+    ::close(ends[0]);
+    ::close(ends[1]);
+}
+
+TEST(OutputFile, WritesNothingToTheNullDevice) {
+    EXPECT_TRUE(writeFile("/dev/null", "content"));
+    EXPECT_TRUE(fs::is_character_file("/dev/null"));
+}
+
+TEST(OutputFile, IsOnTheMediumButNotUnderItsNameWhenItIsComplete) {
+    const TemporaryFolder folder;
+    folder.write("a.fbx", "old");
+    FbxStatus status;
+    OutputFile file(folder.file("a.fbx"));
+    ASSERT_TRUE(file.open(status));
+    file.write(span("new"));
+
+    EXPECT_TRUE(file.complete(status));
+    EXPECT_TRUE(file.complete(status)) << "once more changes nothing";
+
+    EXPECT_EQ(folder.read("a.fbx"), "old");
+    EXPECT_TRUE(file.commit(status)) << status.GetErrorString();
+    EXPECT_EQ(folder.read("a.fbx"), "new");
+    EXPECT_EQ(folder.files().size(), 1U);
+}
+
 bool writeLargeFile(const std::string& name, FileOperations& operations, FbxStatus& status) {
     OutputFile file(name, operations);
     if (!file.open(status)) {
@@ -431,8 +479,9 @@ TEST(OutputFile, DoesNotGatherInMemoryWhatAPipeGets) {
 
 // ---- Files that belong together ----
 
-bool writePair(const TemporaryFolder& folder, FbxStatus& status, FileOperations& operations) {
-    OutputFile first(folder.file("first"), operations), second(folder.file("second"), operations);
+bool writePair(const TemporaryFolder& folder, FbxStatus& status, FileOperations& operations,
+               const char* secondName = "second") {
+    OutputFile first(folder.file("first"), operations), second(folder.file(secondName), operations);
     if (!first.open(status) || !second.open(status)) {
         return false;
     }
@@ -486,6 +535,30 @@ TEST(OutputFilesTogether, SurviveAFaultInEverySingleOperation) {
                 EXPECT_EQ(folder.read("first"), "old first") << failAt;
                 EXPECT_EQ(folder.read("second"), "old second") << failAt;
             }
+        }
+    }
+}
+
+TEST(OutputFilesTogether, OfOneNameAreTheLastOneOrWhatStoodThereBefore) {
+    const TemporaryFolder folder;
+    FbxStatus status;
+    FailingOperations none(-1);
+    ASSERT_TRUE(writePair(folder, status, none, "first")) << status.GetErrorString();
+    EXPECT_EQ(folder.read("first"), "new second");
+    for (const bool replacing : {false, true}) {
+        for (int failAt = 0; failAt < none.calls(); ++failAt) {
+            fs::remove(folder.file("first"));
+            if (replacing) {
+                folder.write("first", "old");
+            }
+            const std::vector<std::string> before = folder.files();
+            FailingOperations operations(failAt);
+
+            const bool written = writePair(folder, status, operations, "first");
+
+            EXPECT_FALSE(written) << failAt;
+            EXPECT_EQ(folder.files(), before) << failAt;
+            EXPECT_EQ(folder.read("first"), replacing ? "old" : "") << failAt;
         }
     }
 }
