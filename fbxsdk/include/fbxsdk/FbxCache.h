@@ -5,6 +5,7 @@
 #pragma once
 
 #include <memory>
+#include <vector>
 
 #include <fbxsdk/FbxObject.h>
 #include <fbxsdk/FbxStatus.h>
@@ -15,7 +16,8 @@ FBXSDK_NAMESPACE_BEGIN
 
 namespace detail {
 class CacheFile;
-}
+class OutputFile;
+} // namespace detail
 
 class FBXSDK_DLL FbxCache : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxCache, FbxObject)
@@ -46,6 +48,9 @@ public:
     bool OpenFileForRead(FbxStatus* pStatus = nullptr);
     bool IsOpen(FbxStatus* pStatus = nullptr) const;
     /// Closes the files; when writing, completes them first. False when not open or on a write error.
+    ///
+    /// What was written has its name then. Only a cache that has a property "AppearWithScene" that is true keeps other
+    /// names until the scene it belongs to is exported: it appears together with the scene's file, or not at all.
     bool CloseFile(FbxStatus* pStatus = nullptr);
 
     /// Frames per second of the samples.
@@ -88,8 +93,13 @@ public:
     bool Read(unsigned int pFrameIndex, double* pBuffer, unsigned int pPointCount, FbxStatus* pStatus = nullptr);
     bool Write(unsigned int pFrameIndex, double* pBuffer, FbxStatus* pStatus = nullptr);
 
+    /// The platform's own view of what waits for the scene's file, in the order in which it should appear.
+    [[nodiscard]] std::vector<detail::OutputFile*> waitingFiles() const;
+    /// Once they have their names, or never will.
+    void forgetWaitingFiles();
+
 private:
-    std::unique_ptr<detail::CacheFile> mFile;
+    std::unique_ptr<detail::CacheFile> mFile, mWaiting;
 };
 
 FBXSDK_NAMESPACE_END

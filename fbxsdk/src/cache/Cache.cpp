@@ -42,6 +42,23 @@ public:
             return &pointReader->header();
         return pointWriter ? &pointWriter->header() : nullptr;
     }
+
+    /// Puts what was written on the medium, under its name or, for the time being, under another.
+    bool finish(bool waits, FbxStatus& status) {
+        if (mayaWriter)
+            return waits ? mayaWriter->complete(status) : mayaWriter->close(status);
+        if (pointWriter)
+            return waits ? pointWriter->complete(status) : pointWriter->close(status);
+        return true;
+    }
+    [[nodiscard]] std::vector<OutputFile*> files() const {
+        if (pointWriter)
+            return {&pointWriter->file()};
+        if (!mayaWriter)
+            return {};
+        const auto both = mayaWriter->files();
+        return {both.begin(), both.end()};
+    }
 };
 
 namespace {
@@ -81,11 +98,20 @@ int roundedTicks(double perSecond) {
     return ticks >= 1.0 && ticks <= 1e9 ? static_cast<int>(ticks) : 1;
 }
 
+/// A frame before zero arrives wrapped around.
+double frameOf(unsigned int index) { return static_cast<double>(static_cast<std::int32_t>(index)); }
+
 /// Where a cache is written: not searched for, unlike where it is read.
 std::string writtenName(const FbxCache& cache) {
     FbxString relative, absolute;
     cache.GetCacheFileName(relative, absolute);
     return (absolute.IsEmpty() ? relative : absolute).Buffer();
+}
+
+/// Whether the files of the cache are to appear with that of its scene.
+bool appearsWithScene(const FbxCache& cache) {
+    const FbxProperty property = cache.FindProperty("AppearWithScene");
+    return property.IsValid() && property.Get<FbxBool>();
 }
 
 const char* const kNotOpen = "the cache is not open";
@@ -175,13 +201,19 @@ bool FbxCache::CloseFile(FbxStatus* pStatus) {
     Outcome outcome(pStatus);
     if (!mFile)
         return outcome.fail(FbxStatus::eFailure, detail::kNotOpen);
-    const std::unique_ptr<detail::CacheFile> file = std::move(mFile);
-    if (file->mayaWriter)
-        return file->mayaWriter->close(outcome.status);
-    if (file->pointWriter)
-        return file->pointWriter->close(outcome.status);
-    return true;
+    std::unique_ptr<detail::CacheFile> file = std::move(mFile);
+    const bool waits = !file->files().empty() && detail::appearsWithScene(*this);
+    const bool finished = file->finish(waits, outcome.status);
+    if (waits)
+        mWaiting = finished ? std::move(file) : nullptr;
+    return finished;
 }
+
+std::vector<detail::OutputFile*> FbxCache::waitingFiles() const {
+    return mWaiting ? mWaiting->files() : std::vector<detail::OutputFile*>();
+}
+
+void FbxCache::forgetWaitingFiles() { mWaiting.reset(); }
 
 double FbxCache::GetSamplingFrameRate(FbxStatus* pStatus) {
     Outcome outcome(pStatus);
@@ -397,10 +429,7 @@ bool FbxCache::Read(unsigned int pFrameIndex, double* pBuffer, unsigned int pPoi
     Outcome outcome(pStatus);
     if (!mFile || !mFile->pointReader || !pBuffer)
         return outcome.fail(FbxStatus::eFailure, detail::kNotMax);
-    // A frame before zero arrives wrapped around.
-    if (pFrameIndex > 0x7FFFFFFFU)
-        return outcome.fail(FbxStatus::eIndexOutOfRange, "a negative frame");
-    return mFile->pointReader->read(pFrameIndex, {pBuffer, std::size_t{pPointCount} * 3}) ||
+    return mFile->pointReader->read(detail::frameOf(pFrameIndex), {pBuffer, std::size_t{pPointCount} * 3}) ||
            outcome.fail(FbxStatus::eInvalidParameter, "the cache has another number of points");
 }
 
@@ -408,9 +437,7 @@ bool FbxCache::Write(unsigned int pFrameIndex, double* pBuffer, FbxStatus* pStat
     Outcome outcome(pStatus);
     if (!mFile || !mFile->pointWriter || !pBuffer)
         return outcome.fail(FbxStatus::eFailure, detail::kNotMax);
-    // A frame before zero arrives wrapped around.
-    const auto frame = static_cast<double>(static_cast<std::int32_t>(pFrameIndex));
-    return mFile->pointWriter->write(frame, pBuffer, outcome.status);
+    return mFile->pointWriter->write(detail::frameOf(pFrameIndex), pBuffer, outcome.status);
 }
 
 FBXSDK_NAMESPACE_END

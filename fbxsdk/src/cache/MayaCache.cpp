@@ -251,13 +251,15 @@ void MayaCacheWriter::extendRange(MayaCacheChannel& channel, std::int32_t ticks)
     mAnySample = true;
 }
 
-bool MayaCacheWriter::close(FbxStatus& status) {
+bool MayaCacheWriter::complete(FbxStatus& status) {
     if (failed(status))
         return false;
     mText.write(mayaCacheDescriptionText(mDescription));
-    // The description last: it is what readers open first.
-    OutputFile* const files[] = {&mData, &mText};
-    return OutputFile::commitTogether(files, status);
+    return mData.complete(status) && mText.complete(status);
+}
+
+bool MayaCacheWriter::close(FbxStatus& status) {
+    return complete(status) && OutputFile::commitTogether(files(), status);
 }
 
 } // namespace detail

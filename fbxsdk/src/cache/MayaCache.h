@@ -4,6 +4,7 @@
 // Open Maya caches: one for reading, one for writing.
 #pragma once
 
+#include <array>
 #include <map>
 #include <memory>
 #include <string>
@@ -44,8 +45,8 @@ private:
     std::shared_ptr<const MappedFile> mData; ///< of caches in one file
 };
 
-/// A cache in one file, of one or more channels. Its two files appear in close(), or never. After a fault nothing more
-/// is written, and close() fails.
+/// A cache in one file, of one or more channels. Its two files appear in close(), or never, or together with others
+/// after complete(). After a fault nothing more is written, and close() fails.
 class MayaCacheWriter {
 public:
     [[nodiscard]] static std::unique_ptr<MayaCacheWriter> open(const std::string& descriptionFile,
@@ -60,6 +61,10 @@ public:
     [[nodiscard]] bool write(std::size_t channel, double seconds, std::span<const double> points, FbxStatus& status);
     /// Completes the data file and the description.
     [[nodiscard]] bool close(FbxStatus& status);
+    /// The same, but for their names.
+    [[nodiscard]] bool complete(FbxStatus& status);
+    /// In the order in which they should appear. The description is last: it is what readers open first.
+    [[nodiscard]] std::array<OutputFile*, 2> files() { return {&mData, &mText}; }
     [[nodiscard]] MayaCacheDescription& description() { return mDescription; }
 
 private:

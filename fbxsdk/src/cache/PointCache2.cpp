@@ -171,12 +171,14 @@ void PointCacheWriter::put(std::uint64_t offset, std::span<const double> points)
     }
 }
 
-bool PointCacheWriter::close(FbxStatus& status) {
+bool PointCacheWriter::complete(FbxStatus& status) {
     if (failed(status))
         return false;
     mFile.extend(kHeaderBytes + sampleBytes(mHeader) * mHeader.sampleCount);
-    return mFile.commit(status);
+    return mFile.complete(status);
 }
+
+bool PointCacheWriter::close(FbxStatus& status) { return complete(status) && mFile.commit(status); }
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -39,7 +39,8 @@ private:
     PointCacheHeader mHeader;
 };
 
-/// The file appears in close(), or never. After a fault nothing more is written, and close() fails.
+/// The file appears in close(), or never, or together with others after complete(). After a fault nothing more is
+/// written, and close() fails.
 class PointCacheWriter {
 public:
     [[nodiscard]] static std::unique_ptr<PointCacheWriter> open(const std::string& fileName,
@@ -51,6 +52,9 @@ public:
     [[nodiscard]] bool write(double frame, const double* points, FbxStatus& status);
     /// Fills up missing samples at the end, so that the file has the size that its header promises.
     [[nodiscard]] bool close(FbxStatus& status);
+    /// The same, but for its name.
+    [[nodiscard]] bool complete(FbxStatus& status);
+    [[nodiscard]] OutputFile& file() { return mFile; }
     [[nodiscard]] const PointCacheHeader& header() const { return mHeader; }
 
 private:

@@ -11,6 +11,7 @@
 #include <optional>
 #include <string_view>
 
+#include <fbxsdk/FbxCache.h>
 #include <fbxsdk/FbxIOPluginRegistry.h>
 #include <fbxsdk/FbxManager.h>
 #include <fbxsdk/FbxPathUtils.h>
@@ -20,6 +21,7 @@
 #include "container/BinarySink.h"
 #include "container/OutputFile.h"
 #include "scene/ManagerData.h"
+#include "scene/SceneMembers.h"
 #include "scene/SceneWriting.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -106,6 +108,21 @@ std::string writeRecords(WritableDocument& document, const VersionTraits& traits
     return sink.fault();
 }
 
+/// Gives the file its name, and before that theirs to the caches that wait for it: all of them, or none.
+bool commitWithCaches(FbxScene& scene, OutputFile& file, FbxStatus& status) {
+    const std::vector<FbxCache*> caches = sourcesOf<FbxCache>(scene);
+    std::vector<OutputFile*> files;
+    for (const FbxCache* cache : caches) {
+        const std::vector<OutputFile*> waiting = cache->waitingFiles();
+        files.insert(files.end(), waiting.begin(), waiting.end());
+    }
+    files.push_back(&file);
+    const bool done = OutputFile::commitTogether(files, status);
+    for (FbxCache* cache : caches)
+        cache->forgetWaitingFiles();
+    return done;
+}
+
 bool writeFile(FbxScene& scene, const std::string& fileName, const VersionTraits& traits, bool binary,
                FbxStatus& status) {
     WritableDocument document;
@@ -120,7 +137,7 @@ bool writeFile(FbxScene& scene, const std::string& fileName, const VersionTraits
         status.SetCode(FbxStatus::eFailure, "%s: cannot be written: %s", fileName.c_str(), fault.c_str());
         return false;
     }
-    return file.commit(status);
+    return commitWithCaches(scene, file, status);
 }
 
 } // namespace

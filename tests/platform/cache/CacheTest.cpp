@@ -3,6 +3,7 @@
 //
 // Point caches as objects: names and formats, both kinds of files written and read back, and every call in every state
 // it is not meant for.
+#include <algorithm>
 #include <array>
 #include <limits>
 #include <string>
@@ -222,13 +223,21 @@ TEST_F(FbxCacheTest, ReadsBackAMaxCacheByFrame) {
     EXPECT_EQ(at(1000), pointsOf(12));
 }
 
-TEST_F(FbxCacheTest, ReadsNoFrameBeforeZeroFromAMaxCache) {
-    FbxCache* made = writtenMax();
+TEST_F(FbxCacheTest, ReadsTheFramesBeforeZeroThatItWritesToAMaxCache) {
+    FbxCache* made = cacheAt(folder.file("ball.pc2"), FbxCache::eMaxPointCacheV2);
+    ASSERT_TRUE(made->OpenFileForWrite(-2.0, 24.0, 3U, 2U));
+    for (int frame = -2; frame <= 0; ++frame) {
+        Points points = pointsOf(frame);
+        EXPECT_TRUE(made->Write(static_cast<unsigned int>(frame), points.data(), &status));
+    }
+    ASSERT_TRUE(made->CloseFile());
     ASSERT_TRUE(made->OpenFileForRead());
-    Points points{};
 
-    EXPECT_FALSE(made->Read(static_cast<unsigned int>(-1), points.data(), 2U, &status));
-    EXPECT_EQ(status.GetCode(), FbxStatus::eIndexOutOfRange);
+    for (int frame = -3; frame <= 1; ++frame) {
+        Points points{};
+        EXPECT_TRUE(made->Read(static_cast<unsigned int>(frame), points.data(), 2U, &status)) << frame;
+        EXPECT_EQ(points, pointsOf(std::clamp(frame, -2, 0))) << frame;
+    }
 }
 
 TEST_F(FbxCacheTest, WritesOnlyFramesThatWereAnnounced) {

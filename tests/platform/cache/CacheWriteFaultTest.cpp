@@ -21,7 +21,9 @@
 #include <gtest/gtest.h>
 
 #include <fbxsdk/FbxCache.h>
+#include <fbxsdk/FbxExporter.h>
 #include <fbxsdk/FbxManager.h>
+#include <fbxsdk/FbxScene.h>
 
 #include "cache/MayaCache.h"
 #include "cache/PointCache2.h"
@@ -211,6 +213,92 @@ TEST_P(CacheWriting, HoldsManyFrames) {
                             : cache->Read(0, time, read.data(), 1U, &status));
         EXPECT_NEAR(read[0], frame, 1e-6);
     }
+}
+
+// ---- Appearing with the scene ----
+
+/// A cache in a scene, which is to appear together with the scene's file.
+class CacheOfAScene : public CacheWriting {
+protected:
+    CacheOfAScene() {
+        cache = FbxCache::Create(scene, "ball");
+        FbxProperty property = FbxProperty::Create(cache, FbxBoolDT, "AppearWithScene");
+        property.ModifyFlag(FbxPropertyFlags::eNotSavable, true);
+        property.Set(true);
+    }
+
+    bool writeWaiting() {
+        cache->SetCacheFileFormat(isMax() ? FbxCache::eMaxPointCacheV2 : FbxCache::eMayaCache);
+        cache->SetCacheFileName("", folder.file(mainName()).c_str());
+        points.resize(6, 1.0);
+        const auto layout = GetParam() == Kind::eWide ? FbxCache::eMCX : FbxCache::eMCC;
+        const bool opened = isMax() ? cache->OpenFileForWrite(0.0, 24.0, 1U, 2U, &status)
+                                    : cache->OpenFileForWrite(FbxCache::eMCOneFile, 24.0, "ball", layout,
+                                                              FbxCache::eDoubleVectorArray, "Points", &status);
+        return opened && write(0) && cache->CloseFile(&status);
+    }
+    bool exportScene(const std::string& name) {
+        FbxExporter* exporter = FbxExporter::Create(manager, "");
+        const bool done = exporter->Initialize(name.c_str(), 0) && exporter->Export(scene);
+        exporter->Destroy();
+        return done;
+    }
+
+    FbxScene* scene = FbxScene::Create(manager, "scene");
+};
+
+INSTANTIATE_TEST_SUITE_P(Formats, CacheOfAScene, testing::Values(Kind::eNarrow, Kind::eWide, Kind::eMax), nameOf);
+
+TEST_P(CacheOfAScene, AppearsTogetherWithTheFileOfTheScene) {
+    writeOldFiles();
+    ASSERT_TRUE(writeWaiting()) << status.GetErrorString();
+    EXPECT_FALSE(cache->IsOpen());
+    EXPECT_EQ(folder.read(mainName()), "old " + mainName());
+    EXPECT_EQ(folder.read(dataName()), "old " + dataName());
+
+    EXPECT_TRUE(exportScene(folder.file("shot.fbx")));
+
+    EXPECT_EQ(folder.files().size(), isMax() ? 2U : 3U);
+    EXPECT_TRUE(fs::exists(folder.file("shot.fbx")));
+    EXPECT_TRUE(cache->OpenFileForRead(&status)) << status.GetErrorString();
+    EXPECT_EQ(folder.read("shot.fbx").find("AppearWithScene"), std::string::npos);
+}
+
+TEST_P(CacheOfAScene, StaysAsItWasWhenTheSceneCannotBeWritten) {
+    writeOldFiles();
+    ASSERT_TRUE(writeWaiting()) << status.GetErrorString();
+
+    EXPECT_FALSE(exportScene("/dev/full"));
+
+    EXPECT_EQ(folder.read(mainName()), "old " + mainName());
+    EXPECT_EQ(folder.read(dataName()), "old " + dataName());
+    EXPECT_EQ(folder.files().size(), isMax() ? 1U : 2U);
+}
+
+TEST_P(CacheOfAScene, LeavesNothingWithoutAnExport) {
+    ASSERT_TRUE(writeWaiting()) << status.GetErrorString();
+
+    scene->Destroy();
+
+    EXPECT_TRUE(folder.files().empty());
+}
+
+TEST_P(CacheOfAScene, IsThatOfTheLastWriteWhenItIsWrittenAgain) {
+    ASSERT_TRUE(writeWaiting()) << status.GetErrorString();
+    ASSERT_TRUE(writeWaiting()) << status.GetErrorString();
+
+    EXPECT_TRUE(exportScene(folder.file("shot.fbx")));
+
+    EXPECT_EQ(folder.files().size(), isMax() ? 2U : 3U);
+}
+
+TEST_P(CacheOfAScene, FailsWhenItIsClosedOnAMediumThatIsFull) {
+    {
+        const SizeLimit full(20);
+        EXPECT_FALSE(writeWaiting());
+    }
+    expectReason("File too large");
+    EXPECT_TRUE(folder.files().empty());
 }
 
 // ---- Faults of the medium ----
