@@ -10,6 +10,7 @@
 
 #include <fbxsdk/FbxAnimCurveNode.h>
 
+#include "scene/IdleCurveNode.h"
 #include "scene/PropertyTypes.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -38,10 +39,25 @@ void spellType(DocumentProperty& property, bool animatable) {
     }
 }
 
+const FbxAnimCurveNode* curveNodeOf(const ConnectionPoint& source) {
+    return source.property < 0 ? FbxCast<FbxAnimCurveNode>(source.object) : nullptr;
+}
+
 bool isAnimated(const PropertyData& property) {
     return std::any_of(property.plug.sources.begin(), property.plug.sources.end(), [](const ConnectionPoint* source) {
-        return source->property < 0 && source->object->Is<FbxAnimCurveNode>();
+        const FbxAnimCurveNode* node = curveNodeOf(*source);
+        return node && !isIdle(*node);
     });
+}
+
+/// Whether anything in the file leads to or from the property.
+bool isConnected(const PropertyData& property) {
+    const auto isWritten = [](const ConnectionPoint* source) {
+        const FbxAnimCurveNode* node = curveNodeOf(*source);
+        return !node || !isIdle(*node);
+    };
+    return !property.plug.destinations.empty() ||
+           std::any_of(property.plug.sources.begin(), property.plug.sources.end(), isWritten);
 }
 
 /// `L` and `M` with the locked and muted components as bits; nothing when there are none.
@@ -125,7 +141,7 @@ bool sameValue(const PropertyValue& a, const PropertyValue& b, EFbxType type) {
 
 /// Connections count too: a reference holds nothing but its connection.
 bool isChanged(const PropertyData& data) {
-    if (!data.row || !data.plug.sources.empty() || !data.plug.destinations.empty())
+    if (!data.row || isConnected(data))
         return true;
     constexpr unsigned kWritten = ~static_cast<unsigned>(FbxPropertyFlags::eImported | FbxPropertyFlags::eAnimated);
     return !sameValue(data.value, defaultValue(*data.row), data.type.GetType()) ||

@@ -17,6 +17,7 @@
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
 
+#include "scene/IdleCurveNode.h"
 #include "scene/ObjectWriting.h"
 #include "scene/PropertyWriting.h"
 #include "scene/SceneData.h"
@@ -69,6 +70,8 @@ private:
     [[nodiscard]] bool isWritten(const FbxObject& object) const {
         if (mScene.sceneData().isFixed(object) || mExcluded.count(&object) > 0)
             return false;
+        if (const auto* node = FbxCast<FbxAnimCurveNode>(&object))
+            return !isIdle(*node);
         // A component without keys is the value of its curve node and nothing else.
         const auto* curve = FbxCast<FbxAnimCurve>(&object);
         return !curve || curve->KeyGetCount() > 0;

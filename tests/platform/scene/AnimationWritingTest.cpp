@@ -217,6 +217,51 @@ TEST_P(AnimationWriting, WritesAComponentWithoutKeysAsAValue) {
     EXPECT_EQ(value[2], 3.0);
 }
 
+TEST_P(AnimationWriting, LeavesOutWhatWasMadeAndNeverKeyed) {
+    auto* light = make<FbxLight>("light");
+    addNode("node", light);
+    light->Intensity.Set(100.0);
+    FbxAnimCurve* curve = light->Intensity.GetCurve(layer, /*pCreate=*/true);
+    ASSERT_NE(curve, nullptr);
+    curve->SetValue(1.0F); // not the property's value: nobody asked for it
+
+    const std::string file = write();
+    FbxScene* copy = read();
+
+    EXPECT_EQ(copy->GetSrcObjectCount<FbxAnimCurveNode>(), 0);
+    FbxLight* back = nodeOf(copy)->GetLight();
+    EXPECT_EQ(back->Intensity.Get(), 100.0);
+    EXPECT_EQ(back->Intensity.EvaluateValue(seconds(0)), 100.0);
+    EXPECT_FALSE(back->Intensity.GetFlag(FbxPropertyFlags::eAnimated));
+    EXPECT_EQ(scene->GetSrcObjectCount<FbxAnimCurveNode>(), 1) << "the scene itself keeps it";
+}
+
+TEST_P(AnimationWriting, LeavesOutACurveNodeThatSaysWhatItsPropertySays) {
+    FbxNode* node = addNode("node");
+    node->LclTranslation.Set(FbxDouble3(1, 2, 3));
+    animate::constants(node->LclTranslation, layer, 1, 2, 3);
+    node->LclScaling.Set(FbxDouble3(1, 2, 3));
+    animate::constants(node->LclScaling, layer, 4, 2, 3); // this one is the value that counts
+
+    FbxScene* copy = writeAndRead();
+
+    EXPECT_EQ(copy->GetSrcObjectCount<FbxAnimCurveNode>(), 1);
+    EXPECT_EQ(nodeOf(copy)->LclTranslation.EvaluateValue(seconds(0)), FbxDouble3(1, 2, 3));
+    EXPECT_EQ(nodeOf(copy)->LclScaling.EvaluateValue(seconds(0)), FbxDouble3(4, 2, 3));
+}
+
+TEST_P(AnimationWriting, KeepsACurveNodeWithoutKeysThatAddsToTheBase) {
+    if (!GetParam().hasIds())
+        return; // older files have one layer
+    FbxNode* node = addNode("node");
+    node->LclTranslation.Set(FbxDouble3(1, 2, 3));
+    animate::constants(node->LclTranslation, animate::addLayer(*stack()), 1, 2, 3);
+
+    FbxScene* copy = writeAndRead();
+
+    EXPECT_EQ(nodeOf(copy)->LclTranslation.EvaluateValue(seconds(0)), FbxDouble3(2, 4, 6));
+}
+
 TEST_P(AnimationWriting, KeepsKeysOfAttributesAndMaterials) {
     FbxCamera* camera = make<FbxCamera>("camera");
     FbxNode* node = addNode("node", camera);
