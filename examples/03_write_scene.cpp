@@ -136,7 +136,7 @@ int main(int argc, char** argv) {
     info.setAnimationStackName("Take 001");
     info.setFileFormat(isGiven("--ascii"));
     info.setFPS(kFramesPerSecond);
-    info.setStartFrame(static_cast<float>(kFirst)); // of the point cache
+    info.setStartFrame(static_cast<float>(kFirst)); // of the shot, and of its point cache
     info.setEndFrame(static_cast<float>(kLast));
     if (!Tarnell::Fbx::Fbx().writeFile(info, {&camera}, {&light}, {}, {&left, &right}, {&sheet})) {
         std::fprintf(stderr, "%s\n", lastError().c_str());

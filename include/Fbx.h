@@ -71,6 +71,8 @@ public:
     /// left out, and so are kinds that `info` does not ask for. There are no markers: they are read but never written.
     /// False when `info` names no file or no animation stack, and when the file cannot be written. Curves go into the
     /// stack "Take 001", whatever the name.
+    /// The file and its caches appear together, or what stood there before stays. A mesh whose cache cannot be written
+    /// is written without it; `lastWarnings()` says so, and what else the file lacks or no program will understand.
     bool writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
                    const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                    const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const;

@@ -29,6 +29,7 @@ namespace Tarnell::Fbx {
 namespace detail {
 class FrameTimes;
 class MemoryAccount;
+class ObjectWarnings;
 class PropertySampler;
 } // namespace detail
 
@@ -292,8 +293,10 @@ public:
 
     /// Global settings, animation stack and one node below the root per object, of the kinds that `info` asks for:
     /// cameras, lights, transforms, nulls, meshes, each in the order of its list. Null pointers and meshes without
-    /// geometry are left out. Curves go into the stack "Take 001", whatever the name in `info`. Point caches of
-    /// animated meshes are written at once, next to where the scene will be saved. False when the context is not
+    /// geometry are left out. Curves go into the stack "Take 001", whatever the name in `info`; its span is that of its
+    /// keys and of the frames of `info`, unless those are 1 to 1 as in new options. Point caches of animated meshes are
+    /// written at once, next to where the scene will be saved. What could not be written, and what no program will make
+    /// sense of, is in `lastWarnings()`. False when the context is not
     /// initialised. Throws std::runtime_error when a layer element has no direct array.
     bool createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
                      const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
@@ -348,8 +351,8 @@ public:
     // ---- Point caches and saving ----
 
     /// A vertex cache on the node's mesh: "<node>.xml" or ".pc2" in the folder "<file>_fpc" beside the FBX file, which
-    /// is made. False for a null argument, an empty file name, a node without geometry or whose name leads out of the
-    /// folder, and when the folder cannot be made.
+    /// is made. What cannot stand in the name of a file is escaped. False for a null argument, an empty file name, a
+    /// node without geometry, and when the folder cannot be made.
     bool mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* meshNode, bool mayaFormat,
                               const std::string& fbxFileName);
 
@@ -358,6 +361,11 @@ public:
     /// written; where it cannot be opened, standard output says so too.
     bool animateVertexCacheOnMesh(fbxsdk::FbxNode* meshNode, const TnFbxMesh* mesh, bool mayaFormat, bool useMcxFormat,
                                   const TnFbxTime& time);
+
+    /// From now on, point caches do not appear until the scene is saved, together with its file: all of them, or none
+    /// and what stood there before stays. Without this each has its name when `animateVertexCacheOnMesh` returns.
+    /// An external platform may give the names at once all the same.
+    void letPointCachesAppearWithScene();
 
     /// Writes the context's scene into the file that `info` names, in its format and version.
     bool saveScene(const TnFbxWriteInfo& info);
@@ -368,6 +376,8 @@ public:
 
 private:
     fbxsdk::FbxAnimLayer* currentLayer() const;
+    void addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const TnFbxWriteInfo& info, const TnFbxTime& time,
+                       detail::ObjectWarnings& warnings);
     template <class Object>
     bool readList(TnFbxReadInfo& info, Object* objects, int count);
     bool readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count, int& index);
@@ -379,6 +389,7 @@ private:
     detail::PropertySampler sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS);
 
     bool mInitialized = false;
+    bool mCachesAppearWithScene = false;
     fbxsdk::FbxManager* mManager = nullptr; // owned
     fbxsdk::FbxScene* mScene = nullptr;     // the manager's
     fbxsdk::FbxAnimStack* mCurrentAnimStack = nullptr;

@@ -70,7 +70,9 @@ public:
     bool setFPS(float framesPerSecond);
     float getFPS() const; ///< Frames per second.
 
-    /// First and last frame written; their fractions are dropped when the range is built.
+    /// First and last frame; their fractions are dropped. Point caches have a sample for each of them, and the span of
+    /// the file reaches from the first to the last, and beyond as far as there are keys. Frames 1 to 1, the default,
+    /// say nothing about the span. Channels are written over their own ranges in any case.
     bool setStartFrame(float startFrame);
     float getStartFrame() const;
     bool setEndFrame(float endFrame);

@@ -6,6 +6,8 @@
 
 #include "FbxSdk.h"
 #include "calls/LastError.h"
+#include "sdk/NewFolders.h"
+#include "sdk/PointCachePlace.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -168,12 +170,18 @@ bool Fbx::writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>&
     if (info.getAnimationStackName().empty()) { // kept: the name is asked for, though the written stack bears another
         return fail("the write options name no animation stack");
     }
+    const auto place = detail::pointCachePlace(info.getFileName(), /*nodeName*/ "", /*extension*/ "");
+    detail::NewFolders folders(std::string(place.folder)); // goes after the context, which takes its files away
     FbxSdk sdk;
     if (!sdk.initFbxSdkManager()) {
         return false;
     }
+    sdk.letPointCachesAppearWithScene();
     const bool result = sdk.createScene(info, cameras, lights, transforms, nulls, meshes) && sdk.saveScene(info);
     sdk.destroyFbxSdkManager();
+    if (result) {
+        folders.keep();
+    }
     return result;
 }
 

@@ -4,6 +4,7 @@
 // From the scene to a file: which writer, which version, and one export.
 #include "FbxSdk.h"
 
+#include "WriterChoice.h"
 #include "calls/LastError.h"
 
 #include <iterator>
@@ -44,19 +45,9 @@ void createExportSettings(fbxsdk::FbxManager* manager, bool embedMedia) {
     }
 }
 
-/// The first FBX writer whose description has the word; the native one when there is none.
-int findWriter(const fbxsdk::FbxIOPluginRegistry& registry, const char* word) {
-    const int count = registry.GetWriterFormatCount();
-    for (int format = 0; format < count; ++format) {
-        const bool isFbx = registry.WriterIsFBX(format);
-        if (isFbx && fbxsdk::FbxString(registry.GetWriterFormatDescription(format)).Find(word) >= 0) {
-            return format;
-        }
-    }
-    return registry.GetNativeWriterFormat();
-}
-
 } // namespace
+
+void FbxSdk::letPointCachesAppearWithScene() { mCachesAppearWithScene = true; }
 
 bool FbxSdk::saveScene(const TnFbxWriteInfo& info) {
     const detail::CallScope call;
@@ -75,7 +66,7 @@ bool FbxSdk::saveScene(fbxsdk::FbxManager* manager, fbxsdk::FbxDocument* documen
     const fbxsdk::FbxIOPluginRegistry& registry = *manager->GetIOPluginRegistry();
     // kept: with embedded media the native writer, also when text is asked for
     const int format =
-        embedMedia ? registry.GetNativeWriterFormat() : findWriter(registry, asciiFormat ? "ascii" : "binary");
+        embedMedia ? registry.GetNativeWriterFormat() : detail::findWriter(registry, asciiFormat ? "ascii" : "binary");
     if (registry.WriterIsFBX(format)) {
         createExportSettings(manager, embedMedia);
     }

@@ -5,13 +5,18 @@
 // frame.
 #include "FbxSdk.h"
 
+#include "ObjectWarnings.h"
 #include "PointCachePlace.h"
 #include "calls/LastError.h"
 #include "model/FrameArithmetic.h"
 
+#include "TnFbxError.h"
+
 #include <cstdint>
+#include <filesystem>
 #include <iostream>
 #include <limits>
+#include <system_error>
 #include <vector>
 
 namespace Tarnell::Fbx {
@@ -25,18 +30,33 @@ using Cache = fbxsdk::FbxCache;
 using Paths = fbxsdk::FbxPathUtils;
 using Text = fbxsdk::FbxString;
 
-/// A node's name may hold separators; it must not lead to files elsewhere.
-bool staysInFolder(const detail::PointCachePlace& place) {
-    const Text folder = place.folder + "/";
-    return Paths::Clean(place.file).Left(folder.GetLen()) == folder;
+fbxsdk::FbxVertexCacheDeformer* deformerOf(fbxsdk::FbxNode& node) {
+    fbxsdk::FbxGeometry* geometry = node.GetGeometry();
+    return fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(
+        geometry != nullptr ? geometry->GetDeformer(0, fbxsdk::FbxDeformer::eVertexCache) : nullptr);
 }
 
 Cache* cacheOf(fbxsdk::FbxNode& node) {
-    fbxsdk::FbxGeometry* geometry = node.GetGeometry();
-    auto* deformer = fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(
-        geometry != nullptr ? geometry->GetDeformer(0, fbxsdk::FbxDeformer::eVertexCache) : nullptr);
+    fbxsdk::FbxVertexCacheDeformer* deformer = deformerOf(node);
     return deformer != nullptr ? deformer->GetCache() : nullptr;
 }
+
+/// The platform gives such a cache its name when the scene is saved.
+void appearWithScene(Cache& cache) {
+    fbxsdk::FbxProperty property = fbxsdk::FbxProperty::Create(&cache, fbxsdk::FbxBoolDT, "AppearWithScene");
+    property.ModifyFlag(fbxsdk::FbxPropertyFlags::eNotSavable, true);
+    property.Set(true);
+}
+
+bool exists(const std::string& file) {
+    std::error_code ignored;
+    return std::filesystem::exists(file, ignored);
+}
+
+constexpr const char* kNoSets = "one set of points per frame of the range is missing; a point cache is named in the "
+                                "file and not written";
+constexpr const char* kOldCache =
+    "a point cache is named in the file and not written; an older one of its name is there";
 
 std::string fileNameOf(const Cache& cache) {
     Text relative, absolute;
@@ -112,9 +132,6 @@ bool FbxSdk::mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* 
     const char* name = meshNode->GetName();
     const auto place = detail::pointCachePlace(
         fbxFileName, name, mayaFormat ? kMayaVertexCacheFileExtension : kMaxVertexCacheFileExtension);
-    if (!staysInFolder(place)) {
-        return fail(std::string(name) + ": a point cache of that name lies outside of its folder");
-    }
     if (!Paths::Create(place.folder)) {
         return fail(std::string(place.folder) + ": the folder cannot be created");
     }
@@ -122,6 +139,9 @@ bool FbxSdk::mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* 
     Cache* cache = Cache::Create(manager, name);
     cache->SetCacheFileName(place.relative, place.file);
     cache->SetCacheFileFormat(mayaFormat ? Cache::eMayaCache : Cache::eMaxPointCacheV2);
+    if (mCachesAppearWithScene) {
+        appearWithScene(*cache);
+    }
 
     auto* deformer = fbxsdk::FbxVertexCacheDeformer::Create(manager, name);
     deformer->SetCache(cache);
@@ -150,6 +170,32 @@ bool FbxSdk::animateVertexCacheOnMesh(fbxsdk::FbxNode* meshNode, const TnFbxMesh
     }
     writeSamples(*cache, meshNode->GetName(), *mesh, mayaFormat, time); // kept: only closing says whether it worked
     return cache->CloseFile(&status) ? succeed() : fail(status.GetErrorString());
+}
+
+void FbxSdk::addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const TnFbxWriteInfo& info,
+                           const TnFbxTime& time, detail::ObjectWarnings& warnings) {
+    const bool maya = info.getMayaVertexCacheFormat();
+    const bool newest = info.getCompatibilityVersion() == TnFbxWriteInfo::kFbxVersion2016;
+    if (!mapVertexCacheOnMesh(mManager, &node, maya, info.getFileName())) {
+        detail::warn(mesh.getName() + ": is written without its animation: " + lastError());
+        return;
+    }
+    if (animateVertexCacheOnMesh(&node, &mesh, maya, newest, time)) {
+        return;
+    }
+    Cache* cache = cacheOf(node);
+    const bool isOldThere = cache != nullptr && exists(fileNameOf(*cache));
+    if (faultOf(mesh, time) != nullptr) { // kept: the deformer stays, and names a file that is not there
+        warnings.add(mesh.getName(), isOldThere ? kOldCache : kNoSets);
+        return;
+    }
+    // Without the deformer: it would read an older cache, or none.
+    detail::warn(mesh.getName() + ": is written without its animation: " + lastError() +
+                 (isOldThere ? "; an older point cache is still there" : ""));
+    deformerOf(node)->Destroy();
+    if (cache != nullptr) {
+        cache->Destroy();
+    }
 }
 
 } // namespace Tarnell::Fbx

@@ -4,6 +4,8 @@
 // Where point caches lie: each FBX file has a folder for them beside it.
 #pragma once
 
+#include "PointCacheName.h"
+
 #include <fbxsdk.h>
 
 #include <string>
@@ -24,7 +26,7 @@ inline PointCachePlace pointCachePlace(const std::string& fbxFileName, const cha
     const fbxsdk::FbxString stem = Paths::GetFileName(fbxFileName.c_str(), /*pWithExtension*/ false);
     PointCachePlace place;
     place.folder = Paths::Bind(fbxFolder, stem + "_fpc"); // the FBX folder may be the root
-    place.file = place.folder + "/" + nodeName + extension.c_str();
+    place.file = place.folder + "/" + pointCacheName(nodeName).c_str() + extension.c_str();
     place.relative = Paths::GetRelativeFilePath(fbxFolder, place.file);
     return place;
 }

@@ -5,10 +5,16 @@
 // object.
 #include "FbxSdk.h"
 
+#include "WriteChecks.h"
 #include "calls/LastError.h"
 #include "model/FrameArithmetic.h"
 
+#include "TnFbxError.h"
+
+#include <algorithm>
 #include <cmath>
+#include <set>
+#include <string_view>
 
 namespace Tarnell::Fbx {
 
@@ -57,16 +63,84 @@ TnFbxTime timeOf(const TnFbxWriteInfo& info) {
     return time;
 }
 
-/// Adds to the root what `makeNode` makes of each object that is one. Its null leaves the object out.
-template <class Object, class MakeNode>
-void addNodes(fbxsdk::FbxNode& root, const std::vector<Object*>& objects, MakeNode makeNode) {
-    for (Object* object : objects) {
-        fbxsdk::FbxNode* node = object != nullptr ? makeNode(*object) : nullptr;
-        if (node != nullptr) {
-            root.AddChild(node);
-        }
+/// An order is in force where a node's rotation settings are active, which they are of cameras and of lights with a
+/// direction. Elsewhere every program turns in the order XYZ.
+void enforceRotationOrder(fbxsdk::FbxNode& node) {
+    fbxsdk::FbxEuler::EOrder order = fbxsdk::FbxEuler::eOrderXYZ;
+    node.GetRotationOrder(fbxsdk::FbxNode::eSourcePivot, order);
+    if (order != fbxsdk::FbxEuler::eOrderXYZ) {
+        node.SetRotationActive(true);
     }
 }
+
+/// The span of time that a file states: that of its keys and of the range to write.
+class WrittenSpan {
+public:
+    void addKeys(fbxsdk::FbxNode& node, fbxsdk::FbxAnimStack* stack) {
+        mFound = node.GetAnimationInterval(mSpan, stack, /*pAnimLayerId*/ 0) || mFound;
+    }
+
+    /// A range that nobody set, and one that is none, widens nothing.
+    void addRange(const TnFbxWriteInfo& info) {
+        const float first = info.getStartFrame(), last = info.getEndFrame(), rate = info.getFPS();
+        const bool isDefault = first == TnFbxWriteInfo::kDefaultStartFrame && last == TnFbxWriteInfo::kDefaultEndFrame;
+        if (isDefault || !(first <= last) || !(rate > 0.0f) || !std::isfinite(rate)) {
+            return;
+        }
+        const TnFbxTime range = timeOf(info);
+        widen(range.getStartFrame(), rate);
+        widen(range.getEndFrame(), rate);
+    }
+
+    void store(fbxsdk::FbxScene& scene, fbxsdk::FbxAnimStack* stack) {
+        if (mFound && stack != nullptr) {
+            stack->SetLocalTimeSpan(mSpan);
+            stack->SetReferenceTimeSpan(mSpan);
+            scene.GetGlobalSettings().SetTimelineDefaultTimeSpan(mSpan);
+        }
+    }
+
+private:
+    void widen(int frame, float framesPerSecond) {
+        Time time;
+        time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(framesPerSecond));
+        mSpan.SetStart(std::min(mSpan.GetStart(), time));
+        mSpan.SetStop(std::max(mSpan.GetStop(), time));
+        mFound = true;
+    }
+
+    fbxsdk::FbxTimeSpan mSpan{FBXSDK_TIME_INFINITE, FBXSDK_TIME_MINUS_INFINITE};
+    bool mFound = false;
+};
+
+/// Adds nodes to the root, and gathers what is to be said of all of them.
+class SceneBuilder {
+public:
+    SceneBuilder(fbxsdk::FbxNode& root, fbxsdk::FbxAnimStack* stack) : mRoot(root), mStack(stack) {}
+
+    /// Adds what `makeNode` makes of each object that is one. Its null leaves the object out.
+    template <class Object, class MakeNode>
+    void addNodes(const std::vector<Object*>& objects, MakeNode makeNode) {
+        for (Object* object : objects) {
+            fbxsdk::FbxNode* node = object != nullptr ? makeNode(*object) : nullptr;
+            if (node != nullptr) {
+                mRoot.AddChild(node);
+                enforceRotationOrder(*node);
+                span.addKeys(*node, mStack);
+                detail::check(*object, warnings);
+            } else if (object != nullptr) {
+                warnings.add(object->getName(), "is left out: " + lastError());
+            }
+        }
+    }
+
+    WrittenSpan span;
+    detail::ObjectWarnings warnings;
+
+private:
+    fbxsdk::FbxNode& mRoot;
+    fbxsdk::FbxAnimStack* mStack;
+};
 
 } // namespace
 
@@ -85,47 +159,53 @@ bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCame
         return fail("the scene has no root node");
     }
 
+    SceneBuilder builder(*root, mCurrentAnimStack);
     // kept: cameras and lights are made in the scene, everything else by the manager
     if (info.getWriteCameras()) {
-        addNodes(*root, cameras, [this](TnFbxCamera& camera) {
+        builder.addNodes(cameras, [this](TnFbxCamera& camera) {
             fbxsdk::FbxNode* node = createCamera(mScene, camera.getName());
             setCameraCurveValues(node, &camera);
             return node;
         });
     }
     if (info.getWriteLights()) {
-        addNodes(*root, lights, [this](TnFbxLight& light) {
+        builder.addNodes(lights, [this](TnFbxLight& light) {
             fbxsdk::FbxNode* node = createLight(mScene, light.getLightType(), light.getName());
             setLightCurveValues(node, &light);
             return node;
         });
     }
     if (info.getWriteTransforms()) {
-        addNodes(*root, transforms, [this](TnFbxTransform& transform) {
+        builder.addNodes(transforms, [this](TnFbxTransform& transform) {
             fbxsdk::FbxNode* node = createNull(mManager, transform.getName());
             setTransformCurveValues(node, &transform);
             return node;
         });
     }
     if (info.getWriteNulls()) {
-        addNodes(*root, nulls, [this](TnFbxNull& null) {
+        builder.addNodes(nulls, [this](TnFbxNull& null) {
             fbxsdk::FbxNode* node = createNull(mManager, null.getName());
             setNullCurveValues(node, &null);
             return node;
         });
     }
     if (info.getWriteMeshes()) { // kept: of a mesh only the points are written, not its transform
-        addNodes(*root, meshes, [this, &info](const TnFbxMesh& mesh) {
+        std::set<std::string_view> cached;
+        builder.addNodes(meshes, [&](const TnFbxMesh& mesh) {
             fbxsdk::FbxNode* node = createMesh(mManager, &mesh, mesh.getName());
-            const bool maya = info.getMayaVertexCacheFormat();
-            if (node != nullptr && info.getAnimateMeshVertices() &&
-                mapVertexCacheOnMesh(mManager, node, maya, info.getFileName())) {
-                const bool newest = info.getCompatibilityVersion() == TnFbxWriteInfo::kFbxVersion2016;
-                animateVertexCacheOnMesh(node, &mesh, maya, newest, timeOf(info));
+            if (node != nullptr && info.getAnimateMeshVertices()) {
+                if (!cached.insert(mesh.getName()).second) { // kept: both write the same file
+                    builder.warnings.add(mesh.getName(), "meshes of one name have one point cache, that of the last");
+                }
+                addPointCache(*node, mesh, info, timeOf(info), builder.warnings);
             }
             return node;
         });
     }
+    builder.span.addRange(info);
+    builder.span.store(*mScene, mCurrentAnimStack);
+    detail::warnAboutRate(info.getFPS(), timeModeOf(info.getFPS()) == Time::eCustom);
+    builder.warnings.report();
     return succeed(); // kept: also when a curve or a point cache could not be written
 }
 

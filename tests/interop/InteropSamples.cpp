@@ -72,7 +72,7 @@ Vector rotated(Vector v, const Triple& degrees, const std::array<int, 3>& order)
     return v;
 }
 
-constexpr std::array<int, 3> kOrderXyz = {0, 1, 2}, kOrderZxy = {2, 0, 1};
+constexpr std::array<int, 3> kOrderXyz = {0, 1, 2}, kOrderZxy = {2, 0, 1}, kOrderYzx = {1, 2, 0};
 
 /// What is expected of one object: where it is at each frame, and where it looks.
 json placed(const std::string& name, const std::string& kind, const Path& position, const Path& rotation,
@@ -156,11 +156,13 @@ void addNulls(Sample& sample) {
     const Path rotation = [](float k) { return Triple{5.0F * k, -20.0F, 40.0F + k}; };
     sample.null.setName("locator");
     sample.transform.setName("tracker 01");
+    sample.null.setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderYZX);
+    sample.transform.setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderZXY); // as new objects have it
     for (TnFbxTransform* object : {static_cast<TnFbxTransform*>(&sample.null), &sample.transform}) {
         animate(*object, Channel::kFbxTransformPositionX, position);
         animate(*object, Channel::kFbxTransformRotationX, rotation);
-        object->setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderXYZ);
-        sample.expected["objects"].push_back(placed(object->getName(), "null", position, rotation, kOrderXyz));
+        const auto& order = object == &sample.null ? kOrderYzx : kOrderZxy;
+        sample.expected["objects"].push_back(placed(object->getName(), "null", position, rotation, order));
     }
 }
 

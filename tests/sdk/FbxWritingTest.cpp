@@ -133,21 +133,63 @@ TEST(FbxWriting, SaysWhichFileCannotBeWritten) {
     EXPECT_THAT(lastError(), StartsWith(file + ": "));
 }
 
-TEST(FbxWriting, ThatFailsLeavesTheOldFileAndTheWholePointCache) {
-    TemporaryFolder folder;
-    fs::create_directories(folder.file("shot.fbx")); // a folder in the place of the file
+/// A mesh with a point cache of two frames.
+bool writeMovingMesh(const std::string& fileName) {
     const auto mesh = test::movingMesh("mesh", 2);
     WrittenObjects objects;
     objects.meshes = {mesh.get()};
-    TnFbxWriteInfo info = optionsFor(folder.file("shot.fbx"));
+    TnFbxWriteInfo info = optionsFor(fileName);
     info.setEndFrame(2.0f);
+    return write(info, objects);
+}
 
-    EXPECT_FALSE(write(info, objects));
+TEST(FbxWriting, ThatFailsLeavesNoPointCacheThatWasNotThere) {
+    TemporaryFolder folder;
+    fs::create_directories(folder.file("shot.fbx")); // a folder in the place of the file
+
+    EXPECT_FALSE(writeMovingMesh(folder.file("shot.fbx")));
 
     EXPECT_THAT(lastError(), HasSubstr("shot.fbx"));
     EXPECT_TRUE(fs::is_directory(folder.file("shot.fbx")));
-    EXPECT_TRUE(fs::exists(folder.file("shot_fpc/mesh.xml")));
-    EXPECT_TRUE(fs::exists(folder.file("shot_fpc/mesh.mcx")));
+    EXPECT_FALSE(fs::exists(folder.file("shot_fpc")));
+}
+
+TEST(FbxWriting, ThatFailsLeavesTheOldPointCache) {
+    TemporaryFolder folder;
+    fs::create_directories(folder.file("shot.fbx"));
+    folder.write("shot_fpc/mesh.xml", "old");
+    folder.write("shot_fpc/mesh.mcx", "old data");
+
+    EXPECT_FALSE(writeMovingMesh(folder.file("shot.fbx")));
+
+    EXPECT_EQ(folder.read("shot_fpc/mesh.xml"), "old");
+    EXPECT_EQ(folder.read("shot_fpc/mesh.mcx"), "old data");
+    EXPECT_EQ(folder.files("shot_fpc").size(), 2U);
+}
+
+TEST(FbxWriting, ThatFailsTakesTheFoldersAwayThatItMade) {
+    TemporaryFolder folder;
+    folder.write("here/other", "somebody else's");
+    fs::create_directories(folder.file("here/there/shot.fbx"));
+
+    EXPECT_FALSE(writeMovingMesh(folder.file("here/there/shot.fbx")));
+
+    EXPECT_EQ(folder.files("here/there"), std::vector<std::string>{"shot.fbx"});
+}
+
+TEST(FbxWriting, OfMeshesOfOneNameSaysThatTheyShareACache) {
+    TemporaryFolder folder;
+    const auto first = test::movingMesh("mesh", 2), second = test::movingMesh("mesh", 2);
+    WrittenObjects objects;
+    objects.meshes = {first.get(), second.get()};
+    TnFbxWriteInfo info = optionsFor(folder.file("shot.fbx"));
+    info.setEndFrame(2.0f);
+
+    EXPECT_TRUE(write(info, objects)) << lastError();
+    EXPECT_TRUE(write(info, objects)) << lastError();
+
+    EXPECT_THAT(lastWarnings(), ElementsAre(StartsWith("mesh: meshes of one name have one point cache")));
+    EXPECT_EQ(folder.files("shot_fpc"), (std::vector<std::string>{"mesh.mcx", "mesh.xml"}));
 }
 
 TEST(FbxWriting, OfAMeshWhoseSetsDoNotFitTheRangeStillWritesTheMesh) {

@@ -178,14 +178,18 @@ TEST(PointCacheMapping, TakesTheLastExtensionOff) {
     EXPECT_TRUE(fs::is_directory(scene.folder.file("shot.v2_fpc")));
 }
 
-TEST(PointCacheMapping, RefusesANameThatLeadsOutOfTheFolder) {
+TEST(PointCacheMapping, NeverLeavesTheFolder) {
     CacheScene scene;
     fbxsdk::FbxNode* outside = scene.sdk.createMesh(scene.manager, scene.mesh.get(), "../../elsewhere");
 
-    EXPECT_FALSE(scene.sdk.mapVertexCacheOnMesh(scene.manager, outside, true, scene.fbxFile()));
+    EXPECT_TRUE(scene.sdk.mapVertexCacheOnMesh(scene.manager, outside, true, scene.fbxFile()));
 
-    EXPECT_THAT(lastError(), HasSubstr("../../elsewhere"));
-    EXPECT_FALSE(fs::exists(scene.folder.file("out")));
+    fbxsdk::FbxString relative, absolute;
+    auto* deformer = fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(
+        outside->GetGeometry()->GetDeformer(0, fbxsdk::FbxDeformer::eVertexCache));
+    deformer->GetCache()->GetCacheFileName(relative, absolute);
+    EXPECT_STREQ(relative, "shot_fpc/..%2F..%2Felsewhere.xml");
+    EXPECT_STREQ(deformer->Channel.Get(), "../../elsewhere") << "the name of the node, as it is";
 }
 
 // ---- The samples ----
@@ -213,6 +217,7 @@ TEST_P(PointCacheSamples, MayStartBeforeFrameZero) {
     EXPECT_TRUE(scene.animate(framesFrom(-1, 1))) << lastError();
 
     ASSERT_TRUE(scene.cache().OpenFileForRead());
+    EXPECT_EQ(scene.setAt(-1), 0.0);
     EXPECT_EQ(scene.setAt(0), 1.0);
     EXPECT_EQ(scene.setAt(1), 2.0);
     EXPECT_TRUE(scene.cache().CloseFile());
@@ -512,6 +517,37 @@ TEST(PointCachesOfAScene, OverwriteEachOtherForMeshesOfOneName) {
     EXPECT_TRUE(scene.create(objects, animatedInfo(folder, 10.0f, 12.0f)));
 
     EXPECT_THAT(scene.childNames(), ElementsAre("mesh", "mesh"));
+    EXPECT_THAT(filesIn(folder.file("out/shot_fpc")), ElementsAre("mesh.mcx", "mesh.xml"));
+}
+
+TEST(PointCachesOfAScene, StayWhenTheSceneCannotBeSaved) {
+    TemporaryFolder folder;
+    fs::create_directories(folder.file("out/shot.fbx")); // a folder in the place of the file
+    WrittenScene scene;
+    const auto mesh = movingMesh("mesh", 3);
+    WrittenObjects objects;
+    objects.meshes = {mesh.get()};
+    const TnFbxWriteInfo info = animatedInfo(folder, 10.0f, 12.0f);
+    ASSERT_TRUE(scene.create(objects, info));
+
+    EXPECT_FALSE(scene.sdk.saveScene(info));
+
+    EXPECT_THAT(filesIn(folder.file("out/shot_fpc")), ElementsAre("mesh.mcx", "mesh.xml"));
+}
+
+TEST(PointCachesOfAScene, WaitForTheSceneWhenTheyAreToAppearWithIt) {
+    TemporaryFolder folder;
+    WrittenScene scene;
+    scene.sdk.letPointCachesAppearWithScene();
+    const auto mesh = movingMesh("mesh", 3);
+    WrittenObjects objects;
+    objects.meshes = {mesh.get()};
+    const TnFbxWriteInfo info = animatedInfo(folder, 10.0f, 12.0f);
+    ASSERT_TRUE(scene.create(objects, info));
+    EXPECT_FALSE(fs::exists(folder.file("out/shot_fpc/mesh.xml")));
+
+    EXPECT_TRUE(scene.sdk.saveScene(info)) << lastError();
+
     EXPECT_THAT(filesIn(folder.file("out/shot_fpc")), ElementsAre("mesh.mcx", "mesh.xml"));
 }
 

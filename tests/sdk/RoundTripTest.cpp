@@ -592,5 +592,169 @@ TEST_P(RoundTrip, OfPointIndicesThatNameNoPointReadsSoundly) {
     EXPECT_GE(read.getNumberOfPolygons(), 0);
 }
 
+// ---- The span of time ----
+
+/// The frames of the file's stack, at the rate of the file.
+TnFbxTime framesOf(const std::string& file) {
+    FbxSdk sdk;
+    TnFbxTime time;
+    EXPECT_TRUE(Fbx().loadScene(file, sdk)) << lastError();
+    EXPECT_TRUE(sdk.getGlobalAnimationStackTime(time, 0.0f, /*useSampleFPS*/ false, 0.0f));
+    return time;
+}
+
+TnFbxNull keyedBetween(int first, int last, float rate = 24.0f) {
+    const auto count = static_cast<std::size_t>(last - first + 1);
+    TnFbxNull null;
+    null.setName("null");
+    null.setTransformValueAt(Transform::kFbxTransformPositionX, timeOf(first, count, rate), Samples(count, 1.5f));
+    return null;
+}
+
+struct SpanRow {
+    int firstKey, lastKey;
+    float start, end;
+    int first, last;
+};
+
+TEST_P(RoundTrip, OfAShotKeepsItsFirstAndLastFrame) {
+    const SpanRow rows[] = {
+        {1001, 1048, 1.0f, 1.0f, 1001, 1048},       // no frames are given: those of the keys
+        {1001, 1048, 1001.0f, 1048.0f, 1001, 1048}, //
+        {1010, 1020, 1001.0f, 1048.9f, 1001, 1048}, // the frames reach further than the keys
+        {990, 1060, 1001.0f, 1048.0f, 990, 1060},   // and the other way round: nothing is cut off
+        {-20, -10, -24.0f, -5.0f, -24, -5},         //
+        {1001, 1048, 1100.0f, 1000.0f, 1001, 1048}, // a range that is none
+    };
+    for (const SpanRow& row : rows) {
+        TnFbxNull null = keyedBetween(row.firstKey, row.lastKey);
+        WrittenObjects objects;
+        objects.nulls = {&null};
+        TnFbxWriteInfo options = info();
+        options.setStartFrame(row.start);
+        options.setEndFrame(row.end);
+        write(objects, options);
+
+        const TnFbxTime time = framesOf(file());
+        EXPECT_EQ(time.getStartFrame(), row.first);
+        EXPECT_EQ(time.getEndFrame(), row.last);
+        const TnFbxTime sampled =
+            FacadeRead<TnFbxNull>(file())["null"].getTransformTime(Transform::kFbxTransformPositionX);
+        EXPECT_EQ(sampled.getStartFrame(), row.first);
+        EXPECT_EQ(sampled.getEndFrame(), row.last);
+    }
+}
+
+TEST_P(RoundTrip, OfAShotWithPointCachesAloneKeepsItsFrames) {
+    const auto mesh = test::movingMesh("mesh", 48);
+    WrittenObjects objects;
+    objects.meshes = {mesh.get()};
+    for (const bool maya : {true, false}) {
+        TnFbxWriteInfo options = info();
+        options.setAnimateMeshVertices(true);
+        options.setMayaVertexCacheFormat(maya);
+        options.setStartFrame(1001.0f);
+        options.setEndFrame(1048.0f);
+        write(objects, options);
+
+        EXPECT_EQ(framesOf(file()).getStartFrame(), 1001);
+        EXPECT_EQ(framesOf(file()).getEndFrame(), 1048);
+        for (const int frame : {1001, 1002, 1048}) {
+            TnFbxReadInfo read = test::localRead(file());
+            read.setFrame(static_cast<float>(frame));
+            float x = 0.0f, y = 0.0f, z = -1.0f;
+            EXPECT_TRUE(FacadeRead<TnFbxMesh>(read)["mesh"].getControlPoint(1, x, y, z));
+            EXPECT_EQ(z, static_cast<float>(frame - 1001));
+        }
+    }
+}
+
+TEST_P(RoundTrip, OfAShotKeepsItsFramesAtEveryRateThatFilesTell) {
+    for (const float rate : {23.976f, 24.0f, 25.0f, 29.9700262f, 30.0f, 48.0f, 50.0f, 60.0f, 100.0f, 120.0f, 1000.0f}) {
+        TnFbxWriteInfo options = info();
+        options.setFPS(rate);
+        options.setStartFrame(1001.0f);
+        options.setEndFrame(1048.0f);
+        write({}, options);
+
+        EXPECT_EQ(framesOf(file()).getStartFrame(), 1001) << rate;
+        EXPECT_EQ(framesOf(file()).getEndFrame(), 1048) << rate;
+    }
+}
+
+TEST_P(RoundTrip, OfNothingHasOneSecond) {
+    write({});
+
+    EXPECT_EQ(framesOf(file()).getStartFrame(), 0);
+    EXPECT_EQ(framesOf(file()).getEndFrame(), 24);
+}
+
+TEST_P(RoundTrip, StatesTheSameSpanAsTheTimeline) {
+    TnFbxWriteInfo options = info();
+    options.setStartFrame(1001.0f);
+    options.setEndFrame(1048.0f);
+    write({}, options);
+
+    FbxSdk sdk;
+    ASSERT_TRUE(Fbx().loadScene(file(), sdk)) << lastError();
+    fbxsdk::FbxTimeSpan timeline;
+    sdk.getScene()->GetGlobalSettings().GetTimelineDefaultTimeSpan(timeline);
+    const auto* stack = sdk.getScene()->GetSrcObject<fbxsdk::FbxAnimStack>(0);
+    EXPECT_EQ(timeline.GetStart().GetFrameCount(fbxsdk::FbxTime::eFrames24), 1001);
+    EXPECT_EQ(timeline.GetStop().GetFrameCount(fbxsdk::FbxTime::eFrames24), 1048);
+    EXPECT_EQ(stack->GetLocalTimeSpan(), timeline);
+    EXPECT_EQ(stack->GetReferenceTimeSpan(), timeline);
+}
+
+// ---- Orientation ----
+
+TEST_P(RoundTrip, TurnsNullsTransformsAndPointLightsInTheirOwnOrder) {
+    constexpr std::array<std::array<int, 3>, 6> kAxes = {
+        {{0, 1, 2}, {0, 2, 1}, {1, 0, 2}, {1, 2, 0}, {2, 0, 1}, {2, 1, 0}}}; // the axes that turn first, second, third
+    constexpr std::array<double, 3> kDegrees = {20.0, -35.0, 50.0};
+    for (std::size_t order = 0; order < kAxes.size(); ++order) {
+        TnFbxNull null;
+        TnFbxTransform transform;
+        TnFbxLight light;
+        light.setLightType(TnFbxLight::kFbxLightPoint);
+        for (TnFbxTransform* object :
+             {static_cast<TnFbxTransform*>(&null), &transform, static_cast<Transform*>(&light)}) {
+            object->setTransformRotationOrder(static_cast<Transform::EFbxTransformRotationOrder>(order));
+            for (int axis = 0; axis < 3; ++axis) {
+                object->setTransformValue(
+                    static_cast<Transform::EFbxTransformChannelType>(Transform::kFbxTransformRotationX + axis),
+                    static_cast<float>(kDegrees[static_cast<std::size_t>(axis)]));
+            }
+        }
+        WrittenObjects objects;
+        objects.nulls = {&null};
+        objects.transforms = {&transform};
+        objects.lights = {&light};
+        write(objects);
+
+        FbxSdk sdk;
+        ASSERT_TRUE(Fbx().loadScene(file(), sdk)) << lastError();
+        fbxsdk::FbxAMatrix expected;
+        for (const int axis : kAxes[order]) {
+            fbxsdk::FbxAMatrix turn;
+            fbxsdk::FbxVector4 angles;
+            angles[axis] = kDegrees[static_cast<std::size_t>(axis)];
+            turn.SetR(angles);
+            expected = turn * expected;
+        }
+        fbxsdk::FbxNode* root = sdk.getScene()->GetRootNode();
+        ASSERT_EQ(root->GetChildCount(), 3);
+        for (int i = 0; i < 3; ++i) {
+            const fbxsdk::FbxAMatrix& found = root->GetChild(i)->EvaluateGlobalTransform();
+            for (int axis = 0; axis < 3; ++axis) {
+                fbxsdk::FbxVector4 unit(0, 0, 0);
+                unit[axis] = 1.0;
+                const fbxsdk::FbxVector4 difference = found.MultT(unit) - expected.MultT(unit);
+                EXPECT_LT(difference.Length(), 1e-6) << "order " << order << ", child " << i;
+            }
+        }
+    }
+}
+
 } // namespace
 } // namespace Tarnell::Fbx

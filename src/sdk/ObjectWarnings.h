@@ -1,0 +1,28 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Warnings about objects of a scene, of which there may be many with the same fault.
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace Tarnell::Fbx::detail {
+
+/// Names the first object that has a fault and counts the others, so that the list stays short enough to be read.
+class ObjectWarnings {
+public:
+    /// `fault` says what is wrong and what comes of it.
+    void add(const std::string& object, const std::string& fault);
+    /// Hands one sentence per fault to `lastWarnings()`.
+    void report() const;
+
+private:
+    struct Row {
+        std::string fault, first;
+        int others;
+    };
+    std::vector<Row> mRows;
+};
+
+} // namespace Tarnell::Fbx::detail

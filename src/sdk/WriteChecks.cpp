@@ -1,0 +1,194 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Sentences about values that are no numbers, rates that are none, and meshes that contradict themselves.
+#include "WriteChecks.h"
+
+#include "calls/LastError.h"
+
+#include <cmath>
+#include <cstdint>
+#include <cstdio>
+
+namespace Tarnell::Fbx {
+
+namespace {
+
+using detail::ObjectWarnings;
+
+constexpr const char* kNoNumbers = "values that are not finite numbers are written as they are, in ASCII as 0";
+constexpr const char* kNoRate = "samples at a rate that is none are written as keys at times that are none";
+
+bool isRate(float framesPerSecond) { return std::isfinite(framesPerSecond) && framesPerSecond > 0.0f; }
+
+bool hasFiniteSamples(const TnFbxChannel& channel) {
+    const TnFbxTime range = channel.getTime();
+    for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
+        if (!std::isfinite(channel.getAnimatedValue(static_cast<float>(frame)))) {
+            return false;
+        }
+    }
+    return true;
+}
+
+/// The faults of the channels of one object, each once.
+class ChannelCheck {
+public:
+    void visit(const TnFbxChannel* channel) {
+        if (channel == nullptr) {
+            return;
+        }
+        mFinite = mFinite && std::isfinite(channel->getValue());
+        if (channel->getAnimated()) {
+            mRate = mRate && isRate(channel->getTime().getFrameRate());
+            mFinite = mFinite && hasFiniteSamples(*channel);
+        }
+    }
+    void report(const std::string& object, ObjectWarnings& warnings) const {
+        if (!mFinite) {
+            warnings.add(object, kNoNumbers);
+        }
+        if (!mRate) {
+            warnings.add(object, kNoRate);
+        }
+    }
+
+private:
+    bool mFinite = true, mRate = true;
+};
+
+void visitPlacement(ChannelCheck& check, TnFbxTransform& transform) {
+    for (int i = TnFbxTransform::kFbxTransformPositionX; i <= TnFbxTransform::kFbxTransformScaleZ; ++i) {
+        check.visit(transform.getTransformChannel(static_cast<TnFbxTransform::EFbxTransformChannelType>(i)));
+    }
+}
+
+void visitLens(ChannelCheck& check, TnFbxCamera& camera) {
+    switch (camera.getApertureMode()) {
+    case TnFbxCamera::kFbxApertureHorizontalAndVertical:
+        check.visit(camera.getCameraChannel(TnFbxCamera::kFbxCameraFieldOfViewX));
+        check.visit(camera.getCameraChannel(TnFbxCamera::kFbxCameraFieldOfViewY));
+        break;
+    case TnFbxCamera::kFbxApertureHorizontal:
+    case TnFbxCamera::kFbxApertureVertical:
+        check.visit(camera.getCameraChannel(TnFbxCamera::kFbxCameraFieldOfView));
+        break;
+    case TnFbxCamera::kFbxApertureFocalLength:
+        check.visit(camera.getCameraChannel(TnFbxCamera::kFbxCameraFocalLength));
+        break;
+    default: // a number that is no mode writes no lens
+        break;
+    }
+}
+
+/// Whether all of `count` triples are numbers; `get` fills one.
+template <class Get>
+bool areFinite(int count, const Get& get) {
+    for (int i = 0; i < count; ++i) {
+        float x = 0.0f, y = 0.0f, z = 0.0f;
+        get(i, x, y, z);
+        if (!std::isfinite(x) || !std::isfinite(y) || !std::isfinite(z)) {
+            return false;
+        }
+    }
+    return true;
+}
+
+bool hasFiniteNumbers(const TnFbxMesh& mesh) {
+    const int corners = mesh.getNumberOfPolygonVertices();
+    const auto point = [&mesh](int i, float& x, float& y, float& z) { mesh.getControlPoint(i, x, y, z); };
+    const auto normal = [&mesh](int i, float& x, float& y, float& z) { mesh.getNormal(i, x, y, z); };
+    const auto uv = [&mesh](int i, float& x, float& y, float&) { mesh.getUV(i, x, y); };
+    const auto colour = [&mesh](int i, float& x, float& y, float& z) {
+        float alpha = 0.0f;
+        mesh.getColour(i, x, y, z, alpha);
+        z += alpha * 0.0f; // not finite when the alpha is not
+    };
+    return areFinite(mesh.getNumberOfControlPoints(), point) &&
+           (!mesh.getValidNormals() || areFinite(corners, normal)) && (!mesh.getValidUVs() || areFinite(corners, uv)) &&
+           (!mesh.getValidColours() || areFinite(corners, colour));
+}
+
+void checkPolygons(const TnFbxMesh& mesh, ObjectWarnings& warnings) {
+    std::int64_t corners = 0;
+    bool anyEmpty = false;
+    for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon) {
+        const int size = mesh.getPolygonVertexSize(polygon);
+        anyEmpty = anyEmpty || size < 1;
+        corners += size > 0 ? size : 0;
+    }
+    if (anyEmpty) {
+        warnings.add(mesh.getName(), "polygons without corners are left out");
+    }
+    if (corners > mesh.getNumberOfPolygonVertices()) {
+        warnings.add(mesh.getName(), "polygons have more corners than the mesh; those beyond its last are at point 0");
+    }
+}
+
+bool namesItsPointsOnly(const TnFbxMesh& mesh) {
+    const int points = mesh.getNumberOfControlPoints();
+    for (int corner = 0; corner < mesh.getNumberOfPolygonVertices(); ++corner) {
+        const int point = mesh.getPointIndex(corner);
+        if (point < 0 || point >= points) {
+            return false;
+        }
+    }
+    return true;
+}
+
+} // namespace
+
+void detail::warnAboutRate(float framesPerSecond, bool isCustom) {
+    char rate[32];
+    std::snprintf(rate, sizeof rate, "%.9g", static_cast<double>(framesPerSecond));
+    if (!isRate(framesPerSecond)) {
+        warn(std::string(rate) + " frames per second are no rate: who reads the file takes another");
+    } else if (isCustom) {
+        warn(std::string(rate) +
+             " frames per second: the file says that its rate is a custom one, but not which; times are right, and who "
+             "counts frames takes another rate");
+    }
+}
+
+void detail::check(TnFbxTransform& transform, ObjectWarnings& warnings) {
+    ChannelCheck check;
+    visitPlacement(check, transform);
+    check.report(transform.getName(), warnings);
+}
+
+void detail::check(TnFbxCamera& camera, ObjectWarnings& warnings) {
+    ChannelCheck check;
+    visitPlacement(check, camera);
+    for (const auto channel :
+         {TnFbxCamera::kFbxCameraApertureWidth, TnFbxCamera::kFbxCameraApertureHeight, TnFbxCamera::kFbxCameraNearPlane,
+          TnFbxCamera::kFbxCameraFarPlane, TnFbxCamera::kFbxCameraFilmOffsetX, TnFbxCamera::kFbxCameraFilmOffsetY}) {
+        check.visit(camera.getCameraChannel(channel));
+    }
+    visitLens(check, camera);
+    check.report(camera.getName(), warnings);
+}
+
+void detail::check(TnFbxLight& light, ObjectWarnings& warnings) {
+    ChannelCheck check;
+    visitPlacement(check, light);
+    for (const auto channel : {TnFbxLight::kFbxLightRed, TnFbxLight::kFbxLightGreen, TnFbxLight::kFbxLightBlue,
+                               TnFbxLight::kFbxLightIntensity}) {
+        check.visit(light.getLightChannel(channel));
+    }
+    if (light.getLightType() == TnFbxLight::kFbxLightSpot) {
+        check.visit(light.getLightChannel(TnFbxLight::kFbxLightConeAngle));
+    }
+    check.report(light.getName(), warnings);
+}
+
+void detail::check(const TnFbxMesh& mesh, ObjectWarnings& warnings) {
+    checkPolygons(mesh, warnings);
+    if (!namesItsPointsOnly(mesh)) {
+        warnings.add(mesh.getName(), "polygons name control points that the mesh does not have");
+    }
+    if (!hasFiniteNumbers(mesh)) {
+        warnings.add(mesh.getName(), kNoNumbers);
+    }
+}
+
+} // namespace Tarnell::Fbx
