@@ -301,5 +301,40 @@ class Convert(unittest.TestCase):
             self.assertEqual(result.returncode, 2, arguments)
         self.assertFalse(os.path.exists(self.out))
 
+    def stack(self):
+        return next(line for line in run("info", self.out).stdout.splitlines() if "Stacks" in line)
+
+    def test_keeps_the_span_of_the_stack(self):
+        for year in YEARS:
+            for encoding in ([], ["--ascii"]):
+                self.convert("--version", year, "--force", *encoding, source=MOVING)
+                self.assertIn("frames 1001 to 1011", self.stack(), (year, encoding))
+        self.convert("--force", "--frames", "990:1020", "--cache", "max", source=MOVING)
+        self.assertIn("frames 990 to 1020", self.stack())
+
+    def test_does_not_wait_for_a_pipe_that_nobody_reads(self):
+        os.mkfifo(self.out)
+        refused = run("convert", SHOT, self.out)
+        self.assertEqual(refused.returncode, 2)
+        self.assertIn("exists", refused.stderr)
+
+        result = run("convert", "--force", SHOT, self.out)
+
+        self.assertEqual(result.returncode, 1)
+        self.assertIn(self.out + ": cannot be written: nobody reads it", result.stderr)
+
+    def test_writes_to_standard_output_and_the_null_device(self):
+        self.assertEqual(run("convert", "--force", SHOT, "/dev/null").returncode, 0)
+
+        result = run("convert", "--force", "--ascii", SHOT, "/dev/stdout")
+
+        self.assertEqual(result.returncode, 0, result.stderr)
+        self.assertTrue(result.stdout.startswith("; FBX 7.5.0 project file"))
+
+    def test_says_what_the_library_warns_of(self):
+        result = self.convert("--fps", "29.97")
+
+        self.assertIn("frames per second: the file says that its rate is a custom one", result.stderr)
+
 
 unittest.main(argv=sys.argv[:1], verbosity=0)

@@ -105,7 +105,7 @@ public:
         info.setAnimateMeshVertices(cachesPoints());
         info.setMayaVertexCacheFormat(mOptions.cache == PointCache::maya);
         info.setStartFrame(static_cast<float>(firstFrame()));
-        info.setEndFrame(static_cast<float>(lastFrame()));
+        info.setEndFrame(static_cast<float>(mOptions.frames ? mOptions.frames->second : mTime.getEndFrame()));
         return mFbx.writeFile(info, mCameras.chosen, mLights.chosen, mTransforms.chosen, mNulls.chosen, mMeshes.chosen);
     }
 
@@ -389,6 +389,8 @@ int convert(const ConvertOptions& options) {
         const bool written = conversion.write();
         for (const std::string& loss : conversion.losses())
             std::cerr << "tarnell-fbx: " << options.input << ": " << loss << '\n';
+        for (const std::string& warning : lastWarnings())
+            printError(options.output, warning);
         if (written)
             return kSuccess;
         printError(options.output, lastError());
