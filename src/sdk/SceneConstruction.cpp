@@ -14,7 +14,6 @@
 #include <algorithm>
 #include <cmath>
 #include <set>
-#include <string_view>
 
 namespace Tarnell::Fbx {
 
@@ -126,7 +125,7 @@ public:
             if (node != nullptr) {
                 mRoot.AddChild(node);
                 enforceRotationOrder(*node);
-                span.addKeys(*node, mStack);
+                mSpan.addKeys(*node, mStack);
                 detail::check(*object, warnings);
             } else if (object != nullptr) {
                 warnings.add(object->getName(), "is left out: " + lastError());
@@ -134,12 +133,28 @@ public:
         }
     }
 
-    WrittenSpan span;
+    /// kept: meshes of one name write the same file.
+    void noteCacheOf(const std::string& mesh) {
+        if (!mCached.insert(mesh).second) {
+            warnings.add(mesh, "meshes of one name have one point cache, that of the last");
+        }
+    }
+
+    /// States the span of time, and says what was noticed.
+    void finish(const TnFbxWriteInfo& info, fbxsdk::FbxScene& scene) {
+        mSpan.addRange(info);
+        mSpan.store(scene, mStack);
+        detail::warnAboutRate(info.getFPS(), timeModeOf(info.getFPS()) == Time::eCustom);
+        warnings.report();
+    }
+
     detail::ObjectWarnings warnings;
 
 private:
     fbxsdk::FbxNode& mRoot;
     fbxsdk::FbxAnimStack* mStack;
+    WrittenSpan mSpan;
+    std::set<std::string> mCached; // names of meshes
 };
 
 } // namespace
@@ -190,22 +205,16 @@ bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCame
         });
     }
     if (info.getWriteMeshes()) { // kept: of a mesh only the points are written, not its transform
-        std::set<std::string_view> cached;
         builder.addNodes(meshes, [&](const TnFbxMesh& mesh) {
             fbxsdk::FbxNode* node = createMesh(mManager, &mesh, mesh.getName());
             if (node != nullptr && info.getAnimateMeshVertices()) {
-                if (!cached.insert(mesh.getName()).second) { // kept: both write the same file
-                    builder.warnings.add(mesh.getName(), "meshes of one name have one point cache, that of the last");
-                }
+                builder.noteCacheOf(mesh.getName());
                 addPointCache(*node, mesh, info, timeOf(info), builder.warnings);
             }
             return node;
         });
     }
-    builder.span.addRange(info);
-    builder.span.store(*mScene, mCurrentAnimStack);
-    detail::warnAboutRate(info.getFPS(), timeModeOf(info.getFPS()) == Time::eCustom);
-    builder.warnings.report();
+    builder.finish(info, *mScene);
     return succeed(); // kept: also when a curve or a point cache could not be written
 }
 
