@@ -164,7 +164,7 @@ double repeatedValue(const CurveKeys& keys, const Extrapolation& extrapolation, 
     const std::int64_t first = keys.times[0];
     const std::uint64_t length = ticksBetween(first, keys.times[lastKey]);
     const Repetition repetition = repetitionOf(first, length, ticks, side);
-    if (extrapolation.count > 0 && repetition.number > static_cast<std::uint64_t>(extrapolation.count)) {
+    if (extrapolation.count >= 0 && repetition.number > static_cast<std::uint64_t>(extrapolation.count)) {
         return valueAfterRepetitions(keys, extrapolation, side);
     }
 

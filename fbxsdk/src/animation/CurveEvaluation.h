@@ -67,7 +67,7 @@ enum class ExtrapolationType : std::uint8_t {
 /// What a curve does on one side of its keys.
 struct Extrapolation {
     ExtrapolationType type = ExtrapolationType::constant;
-    std::int32_t count = -1; ///< repetitions; without end when not greater than zero
+    std::int32_t count = -1; ///< repetitions; 0: none, the end value holds; below: without end
 
     bool operator==(const Extrapolation&) const = default;
 };

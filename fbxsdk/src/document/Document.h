@@ -86,7 +86,7 @@ struct DocumentCurve {
     };
     struct Extrapolation {
         char type = 'C';      ///< C constant, K keep slope, R repeat, M mirror, A repeat relative
-        int repetitions = -1; ///< -1: without end
+        int repetitions = -1; ///< 0: none; -1: without end
     };
     double defaultValue = 0;
     std::vector<std::int64_t> times;           ///< ascending, ticks of kTicksPerSecond

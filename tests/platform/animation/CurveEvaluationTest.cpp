@@ -198,16 +198,27 @@ TEST(CurveEvaluation, HoldsTheEndsWithConstantExtrapolation) {
 }
 
 TEST(CurveEvaluation, RepeatsWithoutEnd) {
-    for (const int count : {-1, 0}) {
-        const Extrapolation repeat = {ExtrapolationType::repetition, count};
-        const CurveKeys curve = curveOf({{1.0, 10.0F}, {3.0, 30.0F}}, repeat, repeat);
+    const Extrapolation repeat = {ExtrapolationType::repetition, -1};
+    const CurveKeys curve = curveOf({{1.0, 10.0F}, {3.0, 30.0F}}, repeat, repeat);
+    EXPECT_EQ(at(curve, 3.0), 30.0F);
+    EXPECT_EQ(at(curve, 3.5), 15.0F);
+    EXPECT_EQ(at(curve, 5.0), 10.0F); // the next repetition begins
+    EXPECT_EQ(at(curve, 1000.5), 25.0F);
+    EXPECT_EQ(at(curve, 0.5), 25.0F);
+    EXPECT_EQ(at(curve, -1.0), 10.0F);
+    EXPECT_EQ(at(curve, -1.5), 25.0F);
+}
+
+// As MotionBuilder's files with `Repetition: 0` are shown.
+TEST(CurveEvaluation, HoldsTheEndsWithoutARepetition) {
+    for (const auto type :
+         {ExtrapolationType::repetition, ExtrapolationType::mirrorRepetition, ExtrapolationType::relativeRepetition}) {
+        const CurveKeys curve = curveOf({{1.0, 10.0F}, {3.0, 30.0F}}, {type, 0}, {type, 0});
         EXPECT_EQ(at(curve, 3.0), 30.0F);
-        EXPECT_EQ(at(curve, 3.5), 15.0F);
-        EXPECT_EQ(at(curve, 5.0), 10.0F); // the next repetition begins
-        EXPECT_EQ(at(curve, 1000.5), 25.0F);
-        EXPECT_EQ(at(curve, 0.5), 25.0F);
-        EXPECT_EQ(at(curve, -1.0), 10.0F);
-        EXPECT_EQ(at(curve, -1.5), 25.0F);
+        EXPECT_EQ(at(curve, 3.5), 30.0F);
+        EXPECT_EQ(at(curve, 1000.5), 30.0F);
+        EXPECT_EQ(at(curve, 0.5), 10.0F);
+        EXPECT_EQ(at(curve, -1000.5), 10.0F);
     }
 }
 
