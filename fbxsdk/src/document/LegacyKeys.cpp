@@ -170,6 +170,21 @@ bool readKeys(DocumentBuilder& builder, const Record& channel, const Record& key
     return !count || std::cmp_equal(count->value(0).toInteger(), curve.times.size());
 }
 
+/// Automatic keys are flat at both ends of a curve, as applications show what they write with the letter 'a': what 7.x
+/// files say of such keys is that their tangents are clamped progressively.
+void flattenEnd(DocumentCurve& curve, std::size_t key) {
+    constexpr std::uint32_t kModes = kKeyCubic | kKeyAuto | kKeyTcb | kKeyUser | kKeyBreak | kKeyClamp;
+    std::uint32_t& index = curve.attributeIndex[key];
+    if ((curve.attributes[index].flags & kModes) != (kKeyCubic | kKeyAuto))
+        return;
+    const bool shared = std::count(curve.attributeIndex.begin(), curve.attributeIndex.end(), index) > 1;
+    if (shared) {
+        curve.attributes.push_back(curve.attributes[index]);
+        index = static_cast<std::uint32_t>(curve.attributes.size() - 1);
+    }
+    curve.attributes[index].flags |= kKeyClampProgressive;
+}
+
 } // namespace
 
 void appendAttribute(DocumentCurve& curve, const DocumentCurve::Attribute& attribute) {
@@ -194,6 +209,8 @@ std::optional<DocumentCurve> readLegacyCurve(DocumentBuilder& builder, const Rec
     curve.pre = readExtrapolation(channel, "Pre-Extrapolation");
     curve.post = readExtrapolation(channel, "Post-Extrapolation");
     sortKeys(curve);
+    flattenEnd(curve, 0);
+    flattenEnd(curve, curve.times.size() - 1);
     return curve;
 }
 

@@ -48,6 +48,13 @@ bool isAutomatic(std::uint32_t flags) {
            (flags & (KeyFlag::tangentUser | KeyFlag::tangentTcb)) == 0;
 }
 
+/// Automatic tangents at the ends of a curve are flat in old files.
+bool isBentEnd(const CurveKeys& keys, std::size_t key) {
+    const bool isFirst = key == 0, isLast = key + 1 == keys.keyCount();
+    return isAutomatic(keys.attributesOf(key).flags) &&
+           ((isFirst && rightSlope(keys, key) != 0.0) || (isLast && leftSlope(keys, key) != 0.0));
+}
+
 /// Which keys an old file can hold as they are. It has the slope at which a cubic key comes to the next one only where
 /// that is worked out anew from the next key, or said by the user.
 std::vector<bool> legacyKeys(const CurveKeys& keys) {
@@ -58,7 +65,7 @@ std::vector<bool> legacyKeys(const CurveKeys& keys) {
     for (std::size_t key = keys.keyCount(); key-- > 0;) {
         const KeyAttributes& attributes = keys.attributesOf(key);
         const bool cubic = (attributes.flags & KeyFlag::cubic) != 0;
-        legacy[key] = hasLegacyForm(attributes) && !(cubic && losesLeftSlope);
+        legacy[key] = hasLegacyForm(attributes) && !isBentEnd(keys, key) && !(cubic && losesLeftSlope);
         const bool workedOut = (attributes.flags & kStored) == 0 && (attributes.flags & kWorkedOut) != 0;
         losesLeftSlope = workedOut && !(cubic && legacy[key]);
     }

@@ -31,6 +31,12 @@ DocumentCurve::Attribute attributeOf(const std::string& tokens) {
     return curve.attributes.empty() ? DocumentCurve::Attribute{.flags = 0xDEAD} : curve.attributes[0];
 }
 
+/// The flags of a key between two others.
+std::uint32_t middleFlagsOf(const std::string& tokens) {
+    const DocumentCurve curve = curveOf(3, "0,1,L,1,1," + tokens + ",2,1,L");
+    return curve.attributeIndex.size() == 3 ? curve.attributes[curve.attributeIndex[1]].flags : 0xDEAD;
+}
+
 TEST(LegacyKeys, ReadsTimesAndValues) {
     const DocumentCurve curve = curveOf(2, "1924423250,-8.5,L,46186158000,2,L");
     EXPECT_EQ(curve.times, (std::vector<std::int64_t>{1924423250, 46186158000}));
@@ -74,14 +80,33 @@ TEST(LegacyKeys, ReadsEveryKindOfWeight) {
 }
 
 TEST(LegacyKeys, ReadsAutomaticKeys) {
-    EXPECT_EQ(attributeOf("U,a,n").flags, kKeyCubic | kKeyAuto);
-    EXPECT_EQ(attributeOf("U,a").flags, kKeyCubic | kKeyAuto);
+    EXPECT_EQ(middleFlagsOf("U,a,n"), kKeyCubic | kKeyAuto);
+    EXPECT_EQ(middleFlagsOf("U,a"), kKeyCubic | kKeyAuto);
     EXPECT_EQ(attributeOf("U,a,a,0.5,0.6").data[3], 0.6F);
     EXPECT_EQ(attributeOf("U,p,1,2,n,n").flags, kKeyCubic | kKeyAuto | kKeyClampProgressive);
     EXPECT_EQ(attributeOf("U,p,1,2,n").flags, kKeyCubic | kKeyAuto | kKeyClampProgressive);
     EXPECT_EQ(attributeOf("U,q,1,2,n,n").flags, kKeyCubic | kKeyAuto | kKeyClamp);
     EXPECT_EQ(attributeOf("U,d,3,n").flags, kKeyCubic | kKeyAuto | kKeyBreak);
     EXPECT_EQ(attributeOf("U,p,1,2,n,n").data[0], 0.0F);
+}
+
+// What the 7.5 files of the same scenes say of such keys: the tangents of the first and the last one are clamped.
+TEST(LegacyKeys, FlattensAutomaticKeysAtBothEnds) {
+    constexpr std::uint32_t kAuto = kKeyCubic | kKeyAuto, kFlat = kAuto | kKeyClampProgressive;
+    const auto flagsOf = [](const DocumentCurve& curve) {
+        std::vector<std::uint32_t> flags;
+        for (const std::uint32_t index : curve.attributeIndex)
+            flags.push_back(curve.attributes[index].flags);
+        return flags;
+    };
+    EXPECT_EQ(flagsOf(curveOf(4, "0,0,U,a,n,1,1,U,a,n,2,1,U,a,n,3,0,U,a,n")),
+              (std::vector<std::uint32_t>{kFlat, kAuto, kAuto, kFlat}));
+    EXPECT_EQ(flagsOf(curveOf(3, "20,0,U,a,n,10,1,U,a,n,0,1,U,a,n")),
+              (std::vector<std::uint32_t>{kFlat, kAuto, kFlat}));
+    EXPECT_EQ(flagsOf(curveOf(2, "0,0,U,s,1,2,n,1,0,L")),
+              (std::vector<std::uint32_t>{kKeyCubic | kKeyUser, kKeyLinear}));
+    EXPECT_EQ(flagsOf(curveOf(2, "0,0,U,q,1,2,n,1,0,U,d,3,n")),
+              (std::vector<std::uint32_t>{kAuto | kKeyClamp, kAuto | kKeyBreak}));
 }
 
 TEST(LegacyKeys, ReadsTensionContinuityAndBias) {
