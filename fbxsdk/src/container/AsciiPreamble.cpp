@@ -55,7 +55,7 @@ AsciiPreamble readPreamble(std::span<const char> bytes) {
         if (chars::is(chars::blank, *text)) {
             ++text;
         } else if (*text == ';') {
-            const char* const lineEnd = std::find(text, end, '\n');
+            const char* const lineEnd = commentEnd(text, end);
             const std::string_view comment(text, static_cast<std::size_t>(lineEnd - text));
             if (const std::uint32_t version = versionOfComment(comment); version != 0 && preamble.version == 0) {
                 preamble.version = version;

@@ -13,6 +13,7 @@
 
 #include <algorithm>
 #include <cstring>
+#include <limits>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -29,6 +30,9 @@ namespace {
 
 /// From this version on, whole numbers in KeyAttrDataFloat are the bits of floats.
 constexpr std::uint32_t kFirstBitPatternVersion = 7200;
+
+/// More than there can be: stands for a count beyond all whole numbers.
+constexpr std::int64_t kMostNumbers = std::numeric_limits<std::int64_t>::max();
 
 struct Entity {
     std::string_view spelling;
@@ -62,15 +66,27 @@ const char* findByte(const char* text, const char* end, char byte) {
     return found != nullptr ? static_cast<const char*>(found) : end;
 }
 
-std::uint64_t countNewlines(const char* text, const char* end) {
+std::uint64_t countBytes(const char* text, const char* end, char byte) {
     std::uint64_t count = 0;
     // Lines are long where files are large, so that searching beats counting byte by byte.
-    while ((text = findByte(text, end, '\n')) != end) {
+    while ((text = findByte(text, end, byte)) != end) {
         ++count;
         ++text;
     }
     return count;
 }
+
+/// Where the text ends: disks and tools fill the rest of a block with zeros.
+const char* endOfText(std::span<const char> bytes) {
+    const char* end = bytes.data() + bytes.size();
+    while (end != bytes.data() && end[-1] == '\0') {
+        --end;
+    }
+    return end;
+}
+
+/// A carriage return where a file has no line feed at all, as files of old Macintosh programs.
+char lineEndOf(const char* text, const char* end) { return findByte(text, end, '\n') != end ? '\n' : '\r'; }
 
 /// A record whose block is being read.
 struct OpenBlock {
@@ -81,18 +97,19 @@ struct OpenBlock {
 class AsciiReader {
 public:
     AsciiReader(std::span<const char> bytes, RecordTree& tree, FbxStatus& status)
-        : mStart(bytes.data()), mEnd(bytes.data() + bytes.size()), mNext(mStart), mCounted(mStart), mTree(tree),
-          mStatus(status) {}
+        : mStart(bytes.data()), mEnd(endOfText(bytes)), mLineEnd(lineEndOf(mStart, mEnd)), mNext(mStart),
+          mCounted(mStart), mTree(tree), mStatus(status) {}
 
     bool read() { return readVersion() && readRecords(); }
 
 private:
     bool fail(const char* place, const std::string& what, FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
-        const std::string line = std::to_string(1 + countNewlines(mStart, place));
+        const std::string line = std::to_string(1 + countBytes(mStart, place, mLineEnd));
         mStatus.SetCode(code, "%s: line %s: %s", mTree.fileName.c_str(), line.c_str(), what.c_str());
         return false;
     }
     bool failUnexpected(const char* place, const std::string& expected);
+    bool refuseZeros(std::string_view token);
 
     [[nodiscard]] bool nextIs(char c) const { return mNext != mEnd && *mNext == c; }
     [[nodiscard]] bool nextIsName() const;
@@ -117,6 +134,7 @@ private:
 
     const char* mStart;
     const char* mEnd;
+    char mLineEnd; ///< what lines are counted by
     const char* mNext;
     const char* mCounted; ///< up to where lines are counted
     std::uint64_t mLine = 1;
@@ -137,6 +155,13 @@ bool AsciiReader::failUnexpected(const char* place, const std::string& expected)
     return fail(place, "expected " + expected + " instead of '" + token + "'");
 }
 
+/// A byte of zero within a name or word comes from a damaged disk or copy; what stands there is lost. False when there
+/// is one.
+bool AsciiReader::refuseZeros(std::string_view token) {
+    const std::size_t zero = token.find('\0');
+    return zero == std::string_view::npos || fail(token.data() + zero, "a byte of zero stands in the text");
+}
+
 /// Whether a name and its colon come next: the start of a record, where otherwise a value might stand.
 bool AsciiReader::nextIsName() const {
     const char* after = tokenEnd(mNext, mEnd);
@@ -152,7 +177,7 @@ bool AsciiReader::nextIsName() const {
 }
 
 std::uint64_t AsciiReader::countLines(const char* place) {
-    mLine += countNewlines(mCounted, place);
+    mLine += countBytes(mCounted, place, mLineEnd);
     mCounted = place;
     return mLine;
 }
@@ -215,6 +240,9 @@ Record& AsciiReader::appendRecord(std::string_view name) {
 }
 
 bool AsciiReader::readRecord() {
+    if (!nextIs('"') && !refuseZeros({mNext, static_cast<std::size_t>(tokenEnd(mNext, mEnd) - mNext)})) {
+        return false;
+    }
     if (!nextIsName()) {
         return failUnexpected(mNext, "a name with a colon");
     }
@@ -314,6 +342,9 @@ bool AsciiReader::readBareValue(Value& value) {
     if (token.empty()) {
         return failUnexpected(start, "a value");
     }
+    if (!refuseZeros(token)) {
+        return false;
+    }
     if (const std::optional<std::int64_t> integer = parseInteger(token)) {
         value = Value::ofInteger(*integer);
         return true;
@@ -333,7 +364,8 @@ bool AsciiReader::readBareValue(Value& value) {
     return true;
 }
 
-/// The count behind the asterisk is not to be trusted, nor needed.
+/// The count behind the asterisk is not needed, and lists that are shorter are read as they are. A list that is longer
+/// has fallen apart: with the decimal comma of some countries each number counts as two.
 bool AsciiReader::readArray(const Record& record, Value& value) {
     ++mNext;
     const std::string_view count = readToken();
@@ -357,6 +389,11 @@ bool AsciiReader::readArray(const Record& record, Value& value) {
         return failUnexpected(mNext, "a number or '}'");
     }
     ++mNext;
+    if (const auto stated = static_cast<std::uint64_t>(parseInteger(count).value_or(kMostNumbers));
+        run.count > stated) {
+        return fail(start, "the list of '" + std::string(record.name) + "' holds " + std::to_string(run.count) +
+                               " numbers, but says " + std::to_string(stated));
+    }
     StoredArray& array = keepArray(start, run);
     array.bitPatterns = mArrayVersion >= kFirstBitPatternVersion && record.name == "KeyAttrDataFloat";
     value = Value::ofArray(array);

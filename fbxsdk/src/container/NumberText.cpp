@@ -7,7 +7,6 @@
 
 #include <algorithm>
 #include <charconv>
-#include <cstring>
 #include <limits>
 #include <system_error>
 
@@ -124,13 +123,16 @@ std::optional<Real> parse(std::string_view token) {
 
 } // namespace
 
+const char* commentEnd(const char* text, const char* end) {
+    return std::find_if(text, end, [](char c) { return c == '\n' || c == '\r'; });
+}
+
 const char* skipBlanks(const char* text, const char* end) {
     while (text != end) {
         if (chars::is(chars::blank, *text)) {
             ++text;
         } else if (*text == ';') {
-            const void* const newline = std::memchr(text, '\n', static_cast<std::size_t>(end - text));
-            text = newline != nullptr ? static_cast<const char*>(newline) : end;
+            text = commentEnd(text, end);
         } else {
             break;
         }

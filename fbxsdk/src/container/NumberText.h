@@ -51,6 +51,9 @@ inline constexpr auto kKinds = [] {
     return text;
 }
 
+/// The end of a comment: a line feed, or a carriage return in files of systems that had it alone.
+[[nodiscard]] const char* commentEnd(const char* text, const char* end);
+
 /// Past blanks and comments.
 [[nodiscard]] const char* skipBlanks(const char* text, const char* end);
 /// Past blanks, comments and commas: what stands between two values. A comma too many means nothing.

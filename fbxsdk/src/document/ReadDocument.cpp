@@ -6,6 +6,7 @@
 
 #include "document/DocumentBuilder.h"
 #include "document/FileTicks.h"
+#include "document/ValueCounts.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -76,6 +77,33 @@ bool isGeneration7(std::uint32_t version, const Record& root) {
     return fits ? stated : !stated;
 }
 
+/// Whether the counts at the head of the file promise objects of this kind; without a kind, any.
+bool promises(const Record& root, std::string_view kind = {}) {
+    const Record* definitions = root.child("Definitions");
+    if (!definitions)
+        return false;
+    for (const Record& type : definitions->children()) {
+        const std::string_view name = type.value(0).toText();
+        if (type.name == "ObjectType" && name != "GlobalSettings" && (kind.empty() || name == kind) &&
+            type.childValue("Count").toInteger() > 0)
+            return true;
+    }
+    return false;
+}
+
+/// Nothing marks the end of a text: one that was cut off between two sections looks whole, and its scene would be
+/// empty.
+bool checkSections(const RecordTree& tree, FbxStatus& status) {
+    const char* missing = nullptr;
+    if (tree.ascii && !tree.root.child("Objects") && promises(tree.root))
+        missing = "objects";
+    else if (tree.ascii && !tree.root.child("Connections") && promises(tree.root, "Model"))
+        missing = "connections";
+    if (missing)
+        status.SetCode(FbxStatus::eInvalidFile, "%s: the file ends before its %s", tree.fileName.c_str(), missing);
+    return missing == nullptr;
+}
+
 bool readByGeneration(DocumentBuilder& builder, FbxStatus& status) {
     const std::uint32_t version = builder.document().version;
     if (version < kFirstVersionOfGeneration6)
@@ -96,6 +124,8 @@ std::unique_ptr<Document> readDocument(std::unique_ptr<RecordTree> tree, FbxStat
                        tree->fileName.c_str(), version, kFirstVersion, kLastVersion);
         return nullptr;
     }
+    if (!checkSections(*tree, status) || !checkValueCounts(*tree, status))
+        return nullptr;
     DocumentBuilder builder(std::move(tree), version);
     builder.document().fileTicksPerSecond = ticksPerSecondOf(builder.root());
     builder.document().creator = creatorOf(builder.root());

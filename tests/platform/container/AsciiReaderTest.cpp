@@ -178,8 +178,43 @@ TEST(AsciiReader, RefusesAWordThatLostItsQuotes) {
 }
 
 TEST(AsciiReader, ReadsArraysAndCountsThemItself) {
-    EXPECT_EQ(asciiText("A: *3 {\n\ta: 1,2.5,-3\n} \nB: *99 { a: 1 }\nC: *0 { a: 1,2 }"),
-              "A: [1 2.5 -3] B: [1] C: [1 2]");
+    EXPECT_EQ(asciiText("A: *3 {\n\ta: 1,2.5,-3\n} \nB: *99 { a: 1 }"), "A: [1 2.5 -3] B: [1]");
+    EXPECT_EQ(asciiText("A: *99999999999999999999999 { a: 1 }"), "A: [1]");
+}
+
+// "35,5" where 35.5 is meant.
+TEST(AsciiReader, RefusesArraysThatHoldMoreThanTheySay) {
+    EXPECT_EQ(asciiText("A: 1\nB: *2 {\n a: 35,5,1,25\n}"),
+              "test.fbx: line 4: the list of 'B' holds 4 numbers, but says 2");
+    EXPECT_EQ(asciiText("C: *0 { a: 1 }"), "test.fbx: line 2: the list of 'C' holds 1 numbers, but says 0");
+}
+
+TEST(AsciiReader, ReadsLinesThatEndWithACarriageReturnAlone) {
+    EXPECT_EQ(readText("; FBX 7.5.0 project file\r; another comment\rA: 1 ; one\rB: *2 { ; two\r a: 1,\r2\r}\rC: 3\r"),
+              "A: 1 B: [1 2] C: 3");
+    EXPECT_EQ(readText("; FBX 7.5.0 project file\rA: 1\rB: ,,1x\r"),
+              "test.fbx: line 3: expected a number instead of '1x'");
+}
+
+TEST(AsciiReader, CountsLinesWithBothLineEndsOnce) {
+    EXPECT_EQ(asciiText("A: 1\r\nB: 1x\r\n"), "test.fbx: line 3: expected a number instead of '1x'");
+}
+
+TEST(AsciiReader, AcceptsZerosBehindTheLastRecord) {
+    EXPECT_EQ(asciiText("A: 1\nB: { C: 2 }\n" + std::string(5000, '\0')), "A: 1 B: { C: 2 }");
+    EXPECT_EQ(asciiText("A: 1\nB: { C: 2 \n" + std::string(3, '\0')),
+              "test.fbx: line 4: the file ends within the block of 'B' from line 3");
+}
+
+TEST(AsciiReader, RefusesZerosAnywhereElse) {
+    const std::string zeros(3, '\0');
+    EXPECT_EQ(asciiText("A: 1\n" + zeros + "Objects: { }"), "test.fbx: line 3: a byte of zero stands in the text");
+    EXPECT_EQ(asciiText("A: 1\n" + zeros + "\nObjects: { }"), "test.fbx: line 3: a byte of zero stands in the text");
+    EXPECT_EQ(asciiText("A: 1\nObj" + zeros + "ects: { }"), "test.fbx: line 3: a byte of zero stands in the text");
+    EXPECT_EQ(asciiText("A: T" + zeros + "\n"), "test.fbx: line 2: a byte of zero stands in the text");
+    EXPECT_NE(asciiText("A: 1" + zeros + "2\n").find("line 2"), std::string::npos);
+    EXPECT_NE(asciiText("A: *1 { a: 1" + zeros + "2 }\n").find("line 2"), std::string::npos);
+    EXPECT_EQ(asciiText("A: \"x" + std::string(1, '\0') + "y\""), "A: \"x" + std::string(1, '\0') + "y\"");
 }
 
 TEST(AsciiReader, ReadsEmptyArrays) {
