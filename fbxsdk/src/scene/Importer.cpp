@@ -95,8 +95,11 @@ bool FbxImporter::Import(FbxDocument* pDocument, bool) {
         return false;
     }
     mStatus.Clear();
-    if (!detail::readScene(mDocument, *scene, mStatus))
+    std::vector<std::string> notes;
+    if (!detail::readScene(mDocument, *scene, mStatus, &notes))
         return false;
+    for (const std::string& note : notes)
+        mHeader.mWarnings.emplace_back(note.c_str());
     scene->GetGlobalSettings().applyTimeMode();
     return true;
 }

@@ -15,6 +15,7 @@
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
 
+#include "scene/MissingTimes.h"
 #include "scene/ObjectReading.h"
 #include "scene/PropertyReading.h"
 #include "scene/SceneData.h"
@@ -160,7 +161,8 @@ void readProducerCameras(FbxScene& scene) {
 
 } // namespace
 
-bool readScene(const std::shared_ptr<const Document>& document, FbxScene& scene, FbxStatus& status) {
+bool readScene(const std::shared_ptr<const Document>& document, FbxScene& scene, FbxStatus& status,
+               std::vector<std::string>* notes) {
     status.Clear();
     scene.sceneData().documents.push_back(document);
     readSettings(*document, scene);
@@ -173,6 +175,9 @@ bool readScene(const std::shared_ptr<const Document>& document, FbxScene& scene,
         reader.read(connection);
     arrangeChannels(objects);
     readProducerCameras(scene);
+    fillStackSpans(*document, objects, scene);
+    if (std::string note = fillFrameRate(*document, objects, scene); notes && !note.empty())
+        notes->push_back(std::move(note));
     return true;
 }
 

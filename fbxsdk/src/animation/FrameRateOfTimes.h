@@ -1,0 +1,24 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The frame rate that key times tell, for files that state none.
+#pragma once
+
+#include <cstdint>
+#include <span>
+
+#include <fbxsdk/FbxArch.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// The rate at which nearly all of these times, in ticks, are whole frames; 0 when nothing speaks for any. Frames count
+/// from time 0. The times are ascending and none stands twice.
+///
+/// The most frequent distance between neighbours is a frame when that is between 12 and 1000 frames per second.
+/// Otherwise, as with sparse keys, the first of the usual rates that fits counts; 30 frames per second, at which a file
+/// without a rate runs, stand first, so that they stay unless the times contradict them.
+[[nodiscard]] double frameRateOfTimes(std::span<const std::int64_t> times);
+
+} // namespace detail
+FBXSDK_NAMESPACE_END
