@@ -6,12 +6,15 @@
 #include "FbxSdk.h"
 
 #include "BlendShapeWeights.h"
+#include "FileWarnings.h"
 #include "PropertySampling.h"
 #include "SkinClusters.h"
+#include "TimeModeScope.h"
 #include "calls/LastError.h"
 
 #include <algorithm>
 #include <memory>
+#include <string>
 #include <vector>
 
 namespace Tarnell::Fbx {
@@ -38,6 +41,13 @@ bool hasClusters(const fbxsdk::FbxMesh& mesh) {
     bool found = false;
     detail::forEachCluster(mesh, [&found](fbxsdk::FbxCluster&) { found = true; });
     return found;
+}
+
+/// A mesh that is read without what its cache holds, under the name of its node.
+void warnOfCache(const std::string& fileName, const fbxsdk::FbxGeometry& geometry, const std::string& reason) {
+    const fbxsdk::FbxNode* node = geometry.GetNode(0);
+    const std::string name = node != nullptr ? node->GetName() : geometry.GetName();
+    detail::warnAbout(fileName, '"' + name + "\" is read without its point cache: " + reason);
 }
 
 /// Adds the way from the base to a target, times the weight, to every point that both have.
@@ -105,15 +115,23 @@ void FbxSdk::readVertexCacheData(fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time, f
 
     std::vector<double> buffer(static_cast<std::size_t>(count) * 3);
     const auto pointCount = static_cast<unsigned int>(count);
+    fbxsdk::FbxStatus status;
     bool read = false;
     if (cache->GetCacheFileFormat() == fbxsdk::FbxCache::eMayaCache) {
         const fbxsdk::FbxString channelName = deformer->Channel.Get();
         const int channel = cache->GetChannelIndex(channelName);
-        read = channel >= 0 && cache->Read(channel, time, buffer.data(), pointCount);
+        if (channel < 0) {
+            warnOfCache(mFileName, *mesh, std::string("it has no channel \"") + channelName.Buffer() + '"');
+            return;
+        }
+        read = cache->Read(channel, time, buffer.data(), pointCount, &status);
     } else {
-        detail::useTimeModeOf(mScene);
+        const detail::TimeModeScope timeMode(mScene);
         const auto frame = static_cast<unsigned int>(time.GetFrameCount(fbxsdk::FbxTime::eDefaultMode));
-        read = cache->Read(frame, buffer.data(), pointCount);
+        read = cache->Read(frame, buffer.data(), pointCount, &status);
+    }
+    if (!read) {
+        warnOfCache(mFileName, *mesh, status.GetErrorString());
     }
     for (std::size_t i = 0; read && i < pointCount; ++i) {
         for (int axis = 0; axis < 3; ++axis) {
@@ -159,12 +177,15 @@ bool FbxSdk::openClosePointCacheData(fbxsdk::FbxScene* scene, bool open) {
         if (cache == nullptr || !deformer->Active.Get()) {
             continue;
         }
+        fbxsdk::FbxStatus status;
         if (!open) {
             if (cache->IsOpen()) {
                 cache->CloseFile();
             }
-        } else if (!cache->IsOpen() && !cache->OpenFileForRead()) { // instances share a cache, which is open then
-            deformer->Active.Set(false);                            // the mesh then reads without its cache
+        } else if (!cache->IsOpen() &&
+                   !cache->OpenFileForRead(&status)) { // instances share a cache, which is open then
+            deformer->Active.Set(false);               // the mesh then reads without its cache
+            warnOfCache(mFileName, *geometry, status.GetErrorString());
         }
     }
     return true; // closing comes after the work, whose failure stays noted

@@ -13,13 +13,6 @@ namespace Tarnell::Fbx {
 
 using detail::PropertySampler;
 
-void detail::useTimeModeOf(const fbxsdk::FbxScene* scene) {
-    if (scene != nullptr) {
-        const fbxsdk::FbxGlobalSettings& settings = scene->GetGlobalSettings();
-        fbxsdk::FbxTime::SetGlobalTimeMode(settings.GetTimeMode(), settings.GetCustomFrameRate());
-    }
-}
-
 std::vector<fbxsdk::FbxAnimLayer*> detail::layersOf(fbxsdk::FbxAnimStack* stack) {
     std::vector<fbxsdk::FbxAnimLayer*> layers;
     if (stack == nullptr) {
@@ -38,7 +31,7 @@ std::vector<fbxsdk::FbxAnimLayer*> detail::layersOf(fbxsdk::FbxAnimStack* stack)
 PropertySampler::PropertySampler(fbxsdk::FbxScene* scene, fbxsdk::FbxAnimStack* stack, const TnFbxTime& requested,
                                  bool useSampleRate, float sampleRate, std::int64_t& samplesLeft,
                                  FrameTimes& frameTimes)
-    : mLayers(layersOf(stack)),
+    : mTimeModeScope(scene), mLayers(layersOf(stack)),
       mTimeMode(scene != nullptr ? scene->GetGlobalSettings().GetTimeMode() : fbxsdk::FbxTime::eDefaultMode),
       mRate(toFloat(fbxsdk::FbxTime::GetFrameRate(mTimeMode))), mRequested(requested),
       mConvert(useSampleRate && sampleRate > 0.0f), mSampleRate(sampleRate), mSamplesLeft(samplesLeft),
@@ -119,7 +112,6 @@ void PropertySampler::readIntoTransform(TnFbxTransform& transform,
 }
 
 detail::PropertySampler FbxSdk::sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS) {
-    detail::useTimeModeOf(mScene);
     return PropertySampler(mScene, mCurrentAnimStack, time, useSampleFPS, sampleFPS, mSamplesLeft, *mFrameTimes);
 }
 

@@ -9,6 +9,7 @@
 
 #include "FrameTimes.h"
 #include "SampleRange.h"
+#include "TimeModeScope.h"
 
 #include "TnFbxTime.h"
 #include "TnFbxTransform.h"
@@ -31,10 +32,6 @@ constexpr Channel channelAfter(Channel channel, int offset) {
 
 /// The number that an enumeration property holds, which in a file can be any.
 inline int enumNumber(const fbxsdk::FbxProperty& property) { return property.Get<fbxsdk::FbxEnum>(); }
-
-/// Makes the scene's rate the one that this thread counts frames at; the scene that was loaded last left its own there.
-/// No scene: nothing changes.
-void useTimeModeOf(const fbxsdk::FbxScene* scene);
 
 /// The layers of an animation stack, in order; none of a null stack.
 std::vector<fbxsdk::FbxAnimLayer*> layersOf(fbxsdk::FbxAnimStack* stack);
@@ -88,6 +85,8 @@ public:
                            const fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property);
 
 private:
+    TimeModeScope mTimeModeScope; // first: the scene's rate is in force while it samples
+
     void collectCurves(const fbxsdk::FbxProperty& property, const char* component);
     SampleRange keyedRange() const;
     float valueAt(const fbxsdk::FbxTime& moment);

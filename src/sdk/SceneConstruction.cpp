@@ -5,6 +5,7 @@
 // object.
 #include "FbxSdk.h"
 
+#include "TimeModeScope.h"
 #include "WriteChecks.h"
 #include "calls/LastError.h"
 #include "model/FrameArithmetic.h"
@@ -163,6 +164,7 @@ bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCame
                          const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                          const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) {
     const detail::CallScope call;
+    const detail::TimeModeScope timeMode; // the scene gets one of its own, and would leave it
     if (!mInitialized || mManager == nullptr || mScene == nullptr) {
         return fail("the FBX manager is not initialised");
     }

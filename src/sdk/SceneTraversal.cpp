@@ -6,10 +6,12 @@
 // The six kinds of objects differ by a row: which nodes they are, and what reads one. Everything else is one walk.
 #include "FbxSdk.h"
 
+#include "FileWarnings.h"
 #include "NodeGeometry.h"
 #include "NodeWalk.h"
 #include "PointCacheScope.h"
 #include "SampleRange.h"
+#include "TimeModeScope.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 
@@ -163,6 +165,35 @@ constexpr Kind<TnFbxTransform> kKind<TnFbxTransform> = {kNoAttribute | bitOf(Att
                                                             bitOf(Attribute::eMarker) | bitOf(Attribute::eMesh),
                                                         true, readPlain<TnFbxTransform, &FbxSdk::getTransform>};
 
+/// The nodes that are counted as objects of the kind, but not read as such.
+template <class Object>
+constexpr std::uint32_t kCountedOnly = 0;
+template <>
+constexpr std::uint32_t kCountedOnly<TnFbxNull> = bitOf(Attribute::eNurbsSurface);
+template <>
+constexpr std::uint32_t kCountedOnly<TnFbxTransform> = bitOf(Attribute::eNurbsSurface);
+
+/// Says how many elements of the array stay as they were made, for want of a reader of surfaces; of one name or of all.
+void warnOfSurfaces(const std::string& fileName, fbxsdk::FbxScene& scene, std::uint32_t types,
+                    const std::string* objectName) {
+    int count = 0;
+    if (types != 0) {
+        detail::walkBelow(scene.GetRootNode(), [&](fbxsdk::FbxNode& node) {
+            const bool wanted = objectName == nullptr || *objectName == node.GetName();
+            count += wanted && (typeBit(node) & types) != 0 ? 1 : 0;
+            return true;
+        });
+    }
+    if (count > 0 && objectName != nullptr) {
+        detail::warnAbout(fileName, '"' + *objectName +
+                                        "\" is a NURBS surface, which is counted but not read: the "
+                                        "object handed out for it has neither name nor values");
+    } else if (count > 0) {
+        detail::warnAbout(fileName, std::to_string(count) + " NURBS surfaces are counted but not read: as many objects "
+                                                            "at the end of the list have neither name nor values");
+    }
+}
+
 /// The state of one walk: what to read and where to put it.
 template <class Object>
 struct Walk {
@@ -314,6 +345,7 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     if (!mInitialized || mScene == nullptr) {
         return fail("no scene is loaded");
     }
+    const detail::TimeModeScope timeMode(mScene);
     mMemory->begin();
     const SampleShare share(mSamplesLeft, mSamplesOfFiles > 0 ? mSamplesOfFiles : kMaxSamplesPerList);
     TnFbxTime time;
@@ -334,6 +366,10 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     fbxsdk::FbxNode* root = mScene->GetRootNode();
     for (int i = 0; root != nullptr && result && !found && i < root->GetChildCount(); ++i) {
         result = walkSubtree(*this, walk, root->GetChild(i));
+    }
+    if (result && !found) {
+        warnOfSurfaces(mFileName, *mScene, kCountedOnly<Object>,
+                       info.getAllObjects() ? nullptr : &info.getObjectName());
     }
     if (result && mMemory->exceeded()) {
         return fail((mFileName.empty() ? "" : mFileName + ": ") + mMemory->describe());

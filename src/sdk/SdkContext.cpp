@@ -5,10 +5,12 @@
 // animation stack with the range of frames to read.
 #include "FbxSdk.h"
 
+#include "FileWarnings.h"
 #include "FrameTimes.h"
 #include "NodeWalk.h"
 #include "PropertySampling.h"
 #include "SampleRange.h"
+#include "TimeModeScope.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 #include "model/FrameArithmetic.h"
@@ -120,6 +122,7 @@ FbxSdk& FbxSdk::operator=(const FbxSdk& other) {
 
 bool FbxSdk::initFbxSdkManager() {
     if (!mInitialized) {
+        destroySdkObjects(&mManager); // of an attempt that ended half-way
         if (!initializeSdkObjects(&mManager, &mScene)) {
             return false;
         }
@@ -167,6 +170,7 @@ bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, con
     if (manager == nullptr || scene == nullptr) {
         return fail(fileName + ": no scene to load it into");
     }
+    const detail::TimeModeScope timeMode; // an import leaves the file's
     fbxsdk::FbxImporter* importer = fbxsdk::FbxImporter::Create(manager, "");
     if (!importer->Initialize(fileName.c_str(), /*pFileFormat: detect*/ -1, /*pIOSettings*/ nullptr)) {
         // the manager releases the importer
@@ -182,6 +186,7 @@ bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, con
     const bool imported = importer->Import(scene, /*pNonBlocking*/ false);
     const bool result =
         imported ? succeed() : failAbout(fileName, importer->GetStatus().GetErrorString(), "cannot be read");
+    detail::warnOfRepairs(fileName, importer->GetFileHeaderInfo());
     importer->Destroy(/*pRecursive*/ false);
     return result;
 }
@@ -261,7 +266,7 @@ bool FbxSdk::getGlobalAnimationStackTime(TnFbxTime& time, float frame, bool useS
     if (!mInitialized || mScene == nullptr || mCurrentAnimStack == nullptr) {
         return fail("no scene is loaded");
     }
-    detail::useTimeModeOf(mScene);
+    const detail::TimeModeScope timeMode(mScene);
     const fbxsdk::FbxTimeSpan span = mCurrentAnimStack->GetLocalTimeSpan();
     const fbxsdk::FbxTime::EMode mode = mScene->GetGlobalSettings().GetTimeMode();
     float rate = static_cast<float>(fbxsdk::FbxTime::GetFrameRate(mode));

@@ -5,6 +5,8 @@
 #include "DeformationScenes.h"
 #include "support/TemporaryFolder.h"
 
+#include "TnFbxError.h"
+
 #include <string>
 
 namespace Tarnell::Fbx {
@@ -134,6 +136,39 @@ TEST_P(VertexCache, ReplacesShapesAndSkin) {
 
     expectPoint(deformed(scene, scene.node, 1)[0], 10.0, 0.0, 1.0);
     scene.sdk.openClosePointCacheData(scene.scene, false);
+}
+
+/// The warnings of a read of the mesh.
+std::vector<std::string> warningsOf(CacheScene& scene) {
+    TnFbxReadInfo info = test::readAll();
+    info.setTransformPoints(false);
+    info.setFrame(2.0f);
+    TnFbxMesh mesh;
+    EXPECT_TRUE(scene.sdk.getMeshes(info, &mesh, 1));
+    return lastWarnings();
+}
+
+TEST_P(VertexCache, ThatFitsItsMeshIsNoWarning) {
+    CacheScene scene(GetParam());
+    EXPECT_EQ(warningsOf(scene), std::vector<std::string>());
+}
+
+TEST_P(VertexCache, OfAnotherNumberOfPointsIsAWarning) {
+    CacheScene scene(GetParam());
+    scene.node->GetMesh()->InitControlPoints(3);
+
+    const std::vector<std::string> warnings = warningsOf(scene);
+
+    ASSERT_EQ(warnings.size(), 1U);
+    EXPECT_EQ(warnings[0].find("\"mesh\" is read without its point cache: "), 0U) << warnings[0];
+}
+
+TEST(MayaVertexCache, WithoutTheChannelOfItsDeformerIsAWarning) {
+    CacheScene scene(FbxCache::eMayaCache);
+    scene.deformer->Channel.Set(fbxsdk::FbxString("another"));
+
+    EXPECT_EQ(warningsOf(scene),
+              std::vector<std::string>{"\"mesh\" is read without its point cache: it has no channel \"another\""});
 }
 
 TEST_P(VertexCache, SwitchedOffLeavesTheSkin) {

@@ -1,0 +1,110 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What a read notices and does not fail for: the caller finds it in `lastWarnings()`, with the file and the object.
+#include "FixtureFiles.h"
+#include "support/FacadeReads.h"
+#include "support/SceneBuilders.h"
+#include "support/TemporaryFolder.h"
+
+#include "TnFbxError.h"
+
+#include <gmock/gmock.h>
+
+#include <filesystem>
+#include <string>
+
+namespace Tarnell::Fbx {
+namespace {
+
+using namespace test;
+using testing::AllOf;
+using testing::Contains;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::StartsWith;
+
+auto says(const std::string& file, const std::string& object, const std::string& reason) {
+    return Contains(AllOf(StartsWith(file + ": "), HasSubstr('"' + object + '"'), HasSubstr(reason)));
+}
+
+/// The fixture of point caches in a folder of its own.
+struct CopiedCaches {
+    CopiedCaches() {
+        std::filesystem::copy(fixture("caches_7400_ascii.fbx"), folder.file("caches_7400_ascii.fbx"));
+        std::filesystem::copy(fixture("caches"), folder.file("caches"), std::filesystem::copy_options::recursive);
+    }
+    [[nodiscard]] std::string file() const { return folder.file("caches_7400_ascii.fbx"); }
+
+    support::TemporaryFolder folder;
+};
+
+TEST(ReadWarnings, AreNoneForASoundFile) {
+    FacadeRead<TnFbxNull> nulls(fixture("curves_7400_ascii.fbx"));
+
+    EXPECT_THAT(lastWarnings(), IsEmpty());
+}
+
+TEST(ReadWarnings, NameMeshesWhoseCacheIsMissing) {
+    const CopiedCaches copy;
+    std::filesystem::remove_all(copy.folder.file("caches"));
+
+    FacadeRead<TnFbxMesh> meshes(localRead(copy.file()));
+
+    EXPECT_GT(meshes.count, 0);
+    for (const std::string& name : meshes.names()) {
+        EXPECT_THAT(lastWarnings(), says(copy.file(), name, "read without its point cache: "));
+    }
+}
+
+TEST(ReadWarnings, NameMeshesWhoseCacheIsDamaged) {
+    const CopiedCaches copy;
+    for (const auto& entry : std::filesystem::recursive_directory_iterator(copy.folder.file("caches"))) {
+        if (entry.is_regular_file()) {
+            std::filesystem::resize_file(entry.path(), entry.file_size() / 2);
+        }
+    }
+
+    FacadeRead<TnFbxMesh> meshes(localRead(copy.file()));
+
+    for (const std::string& name : meshes.names()) {
+        EXPECT_THAT(lastWarnings(), says(copy.file(), name, "read without its point cache: "));
+    }
+}
+
+TEST(ReadWarnings, NameMeshesThatAreDroppedBecauseTheirNameStandsTwice) {
+    const support::TemporaryFolder folder;
+    const std::string mesh = "Model: \"Model::ball\", \"Mesh\" { Vertices: 0,0,0,1,0,0,0,1,0\n"
+                             "PolygonVertexIndex: 0,1,-3\n }\n";
+    const std::string file = folder.write("a.fbx", "; FBX 6.1.0 project file\nObjects: {\n" + mesh + mesh +
+                                                       "}\nConnections: { Connect: \"OO\", \"Model::ball\", "
+                                                       "\"Model::Scene\" }\n");
+    FacadeRead<TnFbxMesh> meshes(localRead(file));
+
+    EXPECT_EQ(meshes.count, 1);
+    EXPECT_THAT(lastWarnings(), says(file, "Model::ball", "this one is left out"));
+}
+
+TEST(ReadWarnings, NameSurfacesThatAreCountedButNotRead) {
+    TestScene scene;
+    scene.add<fbxsdk::FbxNurbsSurface>("surface");
+    scene.addNode("null");
+    TnFbxReadInfo info = readAll();
+    TnFbxNull nulls[2];
+    EXPECT_TRUE(scene.sdk.getNulls(info, nulls, 2));
+    EXPECT_THAT(lastWarnings(), Contains(HasSubstr("1 NURBS surfaces are counted but not read")));
+
+    info.setAllObjects(false);
+    info.setObjectName("surface");
+    TnFbxTransform transform;
+    EXPECT_TRUE(scene.sdk.getTransforms(info, &transform, 1));
+    EXPECT_EQ(transform.getName(), "");
+    EXPECT_THAT(lastWarnings(), Contains(HasSubstr("\"surface\" is a NURBS surface, which is counted but not read")));
+
+    info.setObjectName("null");
+    EXPECT_TRUE(scene.sdk.getTransforms(info, &transform, 1));
+    EXPECT_THAT(lastWarnings(), IsEmpty());
+}
+
+} // namespace
+} // namespace Tarnell::Fbx
