@@ -10,6 +10,7 @@
 #include "support/WritingBuilders.h"
 
 #include "Fbx.h"
+#include "FbxSdk.h"
 #include "TnFbxError.h"
 
 #include <gmock/gmock.h>
@@ -262,6 +263,22 @@ long liveAllocations() {
     const std::vector<std::string>& warnings = lastWarnings();
     return gLive - (allocates(lastError()) ? 1 : 0) - (warnings.capacity() > 0 ? 1 : 0) -
            std::count_if(warnings.begin(), warnings.end(), allocates);
+}
+
+TEST(FailedStart, OfAManagerLeavesNothingBehindWhenItIsRepeated) {
+    const auto startTwice = [](long first) {
+        FbxSdk sdk;
+        const Outcome outcome = outcomeWithoutMemory(first, 1, [&sdk] { return sdk.initFbxSdkManager(); });
+        EXPECT_TRUE(sdk.initFbxSdkManager());
+        return outcome;
+    };
+    startTwice(kNever);
+    const long live = liveAllocations();
+    bool failed = true;
+    for (long first = 0; failed; ++first) {
+        failed = startTwice(first) == Outcome::eThrown;
+        EXPECT_EQ(liveAllocations(), live) << first;
+    }
 }
 
 /// All of the first and the last ones, and some hundred evenly between them.

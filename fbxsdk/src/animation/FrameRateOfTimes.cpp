@@ -94,8 +94,8 @@ double meantRate(double rate) {
 } // namespace
 
 double frameRateOfTimes(std::span<const std::int64_t> times) {
-    const bool says = std::any_of(times.begin(), times.end(), [](std::int64_t time) { return time != 0; });
-    if (!says)
+    const auto isBeyondStart = [](std::int64_t time) { return std::abs(framesAt(time, kFastest)) > 0.5; };
+    if (std::none_of(times.begin(), times.end(), isBeyondStart))
         return 0.0;
     const double distance = usualDistance(times);
     const double byDistance = distance > 0.0 ? kTicksPerSecond / distance : 0.0;

@@ -61,13 +61,13 @@ TEST(FrameRateOfTimes, IsAUsualOneThatFitsSparseKeys) {
     EXPECT_EQ(frameRateOfTimes(timesAt(25.0, 0, 100, 9)), 25.0);
     EXPECT_EQ(frameRateOfTimes(timesAt(29.97, 0, 100, 50)), 29.97);
     EXPECT_EQ(frameRateOfTimes(timesAt(30.0, 0, 90, 15)), 30.0);
-    EXPECT_EQ(frameRateOfTimes({timeOf(0, 25), timeOf(13, 25), timeOf(17, 25), timeOf(40, 25)}), 25.0);
+    EXPECT_EQ(frameRateOfTimes(Times{timeOf(0, 25), timeOf(13, 25), timeOf(17, 25), timeOf(40, 25)}), 25.0);
 }
 
 TEST(FrameRateOfTimes, StaysThirtyUnlessTheTimesContradictIt) {
-    EXPECT_EQ(frameRateOfTimes({timeOf(1, 1)}), 30.0); // a whole second, as at any rate
-    EXPECT_EQ(frameRateOfTimes({timeOf(7, 24)}), 24.0);
-    EXPECT_EQ(frameRateOfTimes({0, timeOf(100, 29.97)}), 29.97);
+    EXPECT_EQ(frameRateOfTimes(Times{timeOf(1, 1)}), 30.0); // a whole second, as at any rate
+    EXPECT_EQ(frameRateOfTimes(Times{timeOf(7, 24)}), 24.0);
+    EXPECT_EQ(frameRateOfTimes(Times{0, timeOf(100, 29.97)}), 29.97);
 }
 
 TEST(FrameRateOfTimes, DoesNotFollowAFewKeysBetweenFrames) {
@@ -83,7 +83,7 @@ TEST(FrameRateOfTimes, FollowsKeysThatAllStandOnHalfFrames) {
 }
 
 TEST(FrameRateOfTimes, IsNoneWhereNothingTellsOne) {
-    EXPECT_EQ(frameRateOfTimes({}), 0.0);
+    EXPECT_EQ(frameRateOfTimes(Times{}), 0.0);
     EXPECT_EQ(frameRateOfTimes(Times{0}), 0.0);
     EXPECT_EQ(frameRateOfTimes(Times{1, 3, 7, 12345, 99999}), 0.0);
     EXPECT_EQ(frameRateOfTimes(Times{INT64_MIN, -1, 0, INT64_MAX}), 0.0);

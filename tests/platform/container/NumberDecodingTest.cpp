@@ -264,7 +264,7 @@ TEST(NumberDecoding, NoticesStreamsOfAnotherLength) {
 }
 
 std::vector<std::int64_t> textAsLongs(const std::string& list) {
-    const ExactBytes bytes("; FBX 7.5.0\nA: *1 { a: " + list + " }");
+    const ExactBytes bytes("; FBX 7.5.0\nA: *99 { a: " + list + " }");
     FbxStatus status;
     const auto tree = readRecords(bytes.span(), "test.fbx", status);
     std::vector<std::int64_t> numbers(tree->root.firstChild->numberCount());

@@ -117,7 +117,8 @@ TEST(Generation7, ReadsTemplatesOfDefinitions) {
             Count: 2
             ObjectType: "GlobalSettings" { Count: 1 }
             ObjectType: "NodeAttribute" { Count: 1
-                PropertyTemplate: "FbxLight" { Properties70: { P: "Intensity", "Number", "", "A",100 } } } })");
+                PropertyTemplate: "FbxLight" { Properties70: { P: "Intensity", "Number", "", "A",100 } } } }
+        Objects: { })");
     ASSERT_EQ(document->templates.size(), 1U);
     EXPECT_EQ(document->templates[0].record, "NodeAttribute");
     EXPECT_EQ(document->templates[0].className, "FbxLight");
