@@ -34,7 +34,7 @@ INSTANTIATE_TEST_SUITE_P(Modes, TimeModeOfTheHost, testing::Values(FbxTime::ePAL
 
 TEST_P(TimeModeOfTheHost, StaysAfterAReadOfTheFacade) {
     FacadeRead<TnFbxNull> nulls(fixture("custom_rate_7400_ascii.fbx"));
-    EXPECT_EQ(nulls["node"].getTransformTime(TnFbxTransform::kFbxTransformPositionX).getFPS(), 12.5f);
+    EXPECT_EQ(nulls["node"].getTransformTime(TnFbxTransform::kFbxTransformPositionX).getFrameRate(), 12.5f);
 }
 
 TEST_P(TimeModeOfTheHost, StaysAfterAReadOfPointCaches) {
@@ -72,12 +72,12 @@ TEST_P(TimeModeOfTheHost, StaysAfterEachOperationOfTheAdapter) {
     EXPECT_EQ(FbxTime::GetGlobalTimeMode(), GetParam());
     TnFbxTime time;
     EXPECT_TRUE(sdk.getGlobalAnimationStackTime(time, 0.0f, false, 0.0f));
-    EXPECT_EQ(time.getFPS(), 12.5f);
+    EXPECT_EQ(time.getFrameRate(), 12.5f);
     EXPECT_EQ(FbxTime::GetGlobalTimeMode(), GetParam());
     TnFbxNull null;
     fbxsdk::FbxAMatrix geometric;
     EXPECT_TRUE(sdk.getNull(time, false, false, 0.0f, sdk.getScene()->GetRootNode()->GetChild(0), null, geometric));
-    EXPECT_EQ(null.getTransformTime(TnFbxTransform::kFbxTransformPositionX).getFPS(), 12.5f);
+    EXPECT_EQ(null.getTransformTime(TnFbxTransform::kFbxTransformPositionX).getFrameRate(), 12.5f);
 }
 
 } // namespace

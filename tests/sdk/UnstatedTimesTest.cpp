@@ -48,7 +48,7 @@ TnFbxTime stackTime(const std::string& fileName) {
 void expectTime(const TnFbxTime& time, int first, int last, float rate) {
     EXPECT_EQ(time.getStartFrame(), first);
     EXPECT_EQ(time.getEndFrame(), last);
-    EXPECT_EQ(time.getFPS(), rate);
+    EXPECT_EQ(time.getFrameRate(), rate);
 }
 
 // ---- Spans of stacks ----
@@ -151,7 +151,7 @@ TEST(CustomRate, IsWorkedOutWithAWarning) {
     const std::string file = folder.write("a.fbx", withKeysAt("0", "3694892640"));
     FacadeRead<TnFbxNull> nulls(localRead(file));
 
-    EXPECT_EQ(nulls["node"].getTransformTime(kX).getFPS(), 12.5f);
+    EXPECT_EQ(nulls["node"].getTransformTime(kX).getFrameRate(), 12.5f);
     EXPECT_EQ(lastWarnings(),
               std::vector<std::string>{file + ": the time mode is custom and states no frame rate; 12.5 frames per "
                                               "second were worked out from its times"});

@@ -91,13 +91,18 @@ bool promises(const Record& root, std::string_view kind = {}) {
     return false;
 }
 
-/// Nothing marks the end of a text: one that was cut off between two sections looks whole, and its scene would be
-/// empty.
+/// Whether a section is missing that was promised, or has a name and nothing else.
+bool lacks(const Record& root, std::string_view section, bool promised) {
+    const Record* record = root.child(section);
+    return record ? !record->hasBlock : promised;
+}
+
+/// Nothing marks the end of a text: one that was cut off between two sections looks whole, and would be an empty scene.
 bool checkSections(const RecordTree& tree, FbxStatus& status) {
     const char* missing = nullptr;
-    if (tree.ascii && !tree.root.child("Objects") && promises(tree.root))
+    if (tree.ascii && lacks(tree.root, "Objects", promises(tree.root)))
         missing = "objects";
-    else if (tree.ascii && !tree.root.child("Connections") && promises(tree.root, "Model"))
+    else if (tree.ascii && lacks(tree.root, "Connections", promises(tree.root, "Model")))
         missing = "connections";
     if (missing)
         status.SetCode(FbxStatus::eInvalidFile, "%s: the file ends before its %s", tree.fileName.c_str(), missing);

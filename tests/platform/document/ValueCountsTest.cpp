@@ -47,6 +47,9 @@ TEST(CutOffFiles, AreRefusedWhereNothingElseShowsIt) {
     const std::string head = "; FBX 7.4.0\nDefinitions: { Count: 2\n ObjectType: \"GlobalSettings\" { Count: 1 }\n";
     const std::string models = head + " ObjectType: \"Model\" { Count: 1 } }\n";
     const std::string objects = "Objects: { Model: 1, \"Model::m\", \"Null\" { } }\n";
+    EXPECT_EQ(errorOf("; FBX 7.4.0\nObjects:"), "test.fbx: the file ends before its objects");
+    EXPECT_EQ(errorOf("; FBX 7.4.0\n" + objects + "Connections:  \n"),
+              "test.fbx: the file ends before its connections");
     EXPECT_EQ(errorOf(models), "test.fbx: the file ends before its objects");
     EXPECT_EQ(errorOf(models + objects), "test.fbx: the file ends before its connections");
     EXPECT_EQ(errorOf(models + objects + "Connections: { }\n"), "");
