@@ -140,6 +140,23 @@ TEST(PropertySampling, LeavesTheSamplesOfAnObjectAloneWhenThePropertyHasNone) {
     EXPECT_EQ(test::samplesOf(transform, Transform::kFbxTransformPositionX), Samples({7.0f, 8.0f}));
 }
 
+// A layer with a curve node, of which one component has a curve and none a key.
+TEST(PropertySampling, TakesCurvesWithoutKeysForNone) {
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("still");
+    node->LclTranslation.Set({1.5, -2.0, 3.25});
+    auto* layer = scene.scene->GetCurrentAnimationStack()->GetMember<fbxsdk::FbxAnimLayer>(0);
+    ASSERT_NE(node->LclTranslation.GetCurve(layer, "X", /*pCreate*/ true), nullptr);
+
+    const Transform transform = localTransform(scene, node, scene.time());
+
+    for (int i = 0; i < 3; ++i) {
+        const auto channel = static_cast<Transform::EFbxTransformChannelType>(Transform::kFbxTransformPositionX + i);
+        EXPECT_FALSE(transform.getTransformAnimated(channel));
+        EXPECT_EQ(transform.getTransformValue(channel), static_cast<float>(node->LclTranslation.Get()[i]));
+    }
+}
+
 TEST(PropertySampling, SamplesEveryFrameOfTheRequestedRangeWhenTheKeysLieInside) {
     TestScene scene(0, 6);
     fbxsdk::FbxNode* node = scene.addNode("moving");

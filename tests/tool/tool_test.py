@@ -7,7 +7,7 @@ import sys
 import tempfile
 import unittest
 
-from support import NO_FRAMES, SHOT, dump, float32, named, run
+from support import NO_FRAMES, SHOT, dump, edited, float32, named, run
 
 CAMERA_CHANNELS = [
     "lookAtPositionX", "lookAtPositionY", "lookAtPositionZ", "upPositionX", "upPositionY", "upPositionZ", "roll",
@@ -144,6 +144,16 @@ class Info(unittest.TestCase):
         for fact in ("7.4, binary", "Blender", "centimetre", "+Y up", "24 frames per second",
                      '"Scene"  frames 1001 to 1048', "1 × camera", "shotCam  [camera]", "targetTip  [null]"):
             self.assertIn(fact, page)
+
+    def test_says_that_a_rate_was_worked_out_from_the_keys(self):
+        with tempfile.TemporaryDirectory() as folder:
+            file = edited("custom_rate_7400_ascii.fbx", os.path.join(folder, "a.fbx"),
+                          ('\t\tP: "CustomFrameRate", "double", "Number", "",12.5\n', ""),
+                          ("a: 7389785280,18474463200", "a: 0,3694892640"))
+            page = run("info", file).stdout
+        self.assertIn("Frame rate    12.5 frames per second\n", page)
+        self.assertIn("Repaired      the time mode is custom and states no frame rate; 12.5 frames per second were "
+                      "worked out from its times\n", page)
 
     def test_takes_several_files_and_goes_on_after_a_bad_one(self):
         result = run("info", SHOT, "missing.fbx", SHOT)

@@ -123,7 +123,7 @@ std::string fillFrameRate(const Document& document, const std::vector<FbxObject*
     const FbxAnimStack* first = nullptr;
     eachStack(document, objects, [&](const DocumentObject&, FbxAnimStack& stack) { first = first ? first : &stack; });
     const double rate = first ? frameRateOfTimes(timesOf(*first)) : 0.0;
-    const std::string start = document.tree->fileName + ": the time mode is custom and states no frame rate; ";
+    const std::string start = "the time mode is custom and states no frame rate; ";
     if (rate <= 0.0)
         return start + "nothing in the file tells one, 30 frames per second are assumed";
     settings.FindProperty("CustomFrameRate").Set(rate);
