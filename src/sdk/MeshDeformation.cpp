@@ -13,6 +13,7 @@
 #include "calls/LastError.h"
 
 #include <algorithm>
+#include <cmath>
 #include <memory>
 #include <string>
 #include <vector>
@@ -43,11 +44,41 @@ bool hasClusters(const fbxsdk::FbxMesh& mesh) {
     return found;
 }
 
-/// A mesh that is read without what its cache holds, under the name of its node.
-void warnOfCache(const std::string& fileName, const fbxsdk::FbxGeometry& geometry, const std::string& reason) {
+void closeCache(fbxsdk::FbxVertexCacheDeformer& deformer) {
+    fbxsdk::FbxCache* cache = deformer.GetCache();
+    if (cache != nullptr && deformer.Active.Get() && cache->IsOpen()) {
+        cache->CloseFile();
+    }
+}
+
+/// Opens the cache unless an instance has done so already. Why it cannot be used; empty when it can.
+///
+/// kept: one that does not open is switched off, and the mesh then reads without it.
+std::string openingFault(fbxsdk::FbxVertexCacheDeformer& deformer) {
+    if (!deformer.Active.Get()) {
+        return "it is switched off";
+    }
+    fbxsdk::FbxCache* cache = deformer.GetCache();
+    if (cache == nullptr) {
+        return "the file does not say which";
+    }
+    fbxsdk::FbxStatus status;
+    if (cache->IsOpen() || cache->OpenFileForRead(&status)) {
+        return {};
+    }
+    deformer.Active.Set(false);
+    return status.GetErrorString();
+}
+
+/// That of its node, where there is one.
+std::string nameOf(const fbxsdk::FbxGeometry& geometry) {
     const fbxsdk::FbxNode* node = geometry.GetNode(0);
-    const std::string name = node != nullptr ? node->GetName() : geometry.GetName();
-    detail::warnAbout(fileName, '"' + name + "\" is read without its point cache: " + reason);
+    return node != nullptr ? node->GetName() : geometry.GetName();
+}
+
+/// A mesh that is read without what its cache holds.
+void warnOfCache(const std::string& fileName, const fbxsdk::FbxGeometry& geometry, const std::string& reason) {
+    detail::warnAbout(fileName, '"' + nameOf(geometry) + "\" is read without its point cache: " + reason);
 }
 
 /// Adds the way from the base to a target, times the weight, to every point that both have.
@@ -133,6 +164,9 @@ void FbxSdk::readVertexCacheData(fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time, f
     if (!read) {
         warnOfCache(mFileName, *mesh, status.GetErrorString());
     }
+    if (read && !std::all_of(buffer.begin(), buffer.end(), [](double number) { return std::isfinite(number); })) {
+        detail::warnAbout(mFileName, '"' + nameOf(*mesh) + "\" has points in its point cache that are not finite");
+    }
     for (std::size_t i = 0; read && i < pointCount; ++i) {
         for (int axis = 0; axis < 3; ++axis) {
             points[i][axis] = buffer[3 * i + static_cast<std::size_t>(axis)];
@@ -173,19 +207,13 @@ bool FbxSdk::openClosePointCacheData(fbxsdk::FbxScene* scene, bool open) {
         fbxsdk::FbxNode* node = scene->GetNode(i);
         const fbxsdk::FbxGeometry* geometry = node != nullptr ? node->GetGeometry() : nullptr;
         fbxsdk::FbxVertexCacheDeformer* deformer = geometry != nullptr ? vertexCacheOf(*geometry) : nullptr;
-        fbxsdk::FbxCache* cache = deformer != nullptr ? deformer->GetCache() : nullptr;
-        if (cache == nullptr || !deformer->Active.Get()) {
+        if (deformer == nullptr) {
             continue;
         }
-        fbxsdk::FbxStatus status;
         if (!open) {
-            if (cache->IsOpen()) {
-                cache->CloseFile();
-            }
-        } else if (!cache->IsOpen() &&
-                   !cache->OpenFileForRead(&status)) { // instances share a cache, which is open then
-            deformer->Active.Set(false);               // the mesh then reads without its cache
-            warnOfCache(mFileName, *geometry, status.GetErrorString());
+            closeCache(*deformer);
+        } else if (const std::string fault = openingFault(*deformer); !fault.empty()) {
+            warnOfCache(mFileName, *geometry, fault);
         }
     }
     return true; // closing comes after the work, whose failure stays noted

@@ -164,7 +164,6 @@ bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCame
                          const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                          const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) {
     const detail::CallScope call;
-    const detail::TimeModeScope timeMode; // the scene gets one of its own, and would leave it
     if (!mInitialized || mManager == nullptr || mScene == nullptr) {
         return fail("the FBX manager is not initialised");
     }
@@ -263,6 +262,7 @@ bool FbxSdk::setGlobalTimeSettings(fbxsdk::FbxScene* scene, float framesPerSecon
     if (scene == nullptr) {
         return fail("no scene for the global time settings");
     }
+    const detail::TimeModeScope timeMode; // the scene's settings would leave theirs
     scene->GetGlobalSettings().SetTimeMode(timeModeOf(framesPerSecond));
     return succeed();
 }

@@ -163,6 +163,19 @@ TEST_P(VertexCache, OfAnotherNumberOfPointsIsAWarning) {
     EXPECT_EQ(warnings[0].find("\"mesh\" is read without its point cache: "), 0U) << warnings[0];
 }
 
+TEST_P(VertexCache, ThatIsSwitchedOffIsAWarning) {
+    CacheScene scene(GetParam(), /*active*/ false);
+    EXPECT_EQ(warningsOf(scene),
+              std::vector<std::string>{"\"mesh\" is read without its point cache: it is switched off"});
+}
+
+TEST_P(VertexCache, ThatNobodyNamesIsAWarning) {
+    CacheScene scene(GetParam());
+    scene.deformer->SetCache(nullptr);
+    EXPECT_EQ(warningsOf(scene),
+              std::vector<std::string>{"\"mesh\" is read without its point cache: the file does not say which"});
+}
+
 TEST(MayaVertexCache, WithoutTheChannelOfItsDeformerIsAWarning) {
     CacheScene scene(FbxCache::eMayaCache);
     scene.deformer->Channel.Set(fbxsdk::FbxString("another"));
