@@ -5,13 +5,11 @@
 #pragma once
 
 #include "LoadedFile.h"
+#include "Matrices.h"
 
-#include <array>
 #include <vector>
 
 namespace conformance {
-
-using Point = std::array<double, 3>;
 
 /// Whether skins or caches move the mesh's points.
 bool isDeformed(fbxsdk::FbxMesh& mesh);

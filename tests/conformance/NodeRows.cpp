@@ -2,6 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The tree of nodes, the animation stacks, and where the nodes are.
+#include "Matrices.h"
 #include "Rows.h"
 #include "Tolerances.h"
 
@@ -90,24 +91,6 @@ int referenceInherit(const FbxNode& node) {
 
 std::string missing(const ReferenceNode& node) { return "no node \"" + node.name + "\""; }
 
-/// Axes are compared by the size of the axes, the translation by its own.
-bool sameMatrix(const Matrix12& actual, const Matrix12& expected) {
-    constexpr std::size_t kAxes = 9;
-    const auto largest = [&](std::size_t begin, std::size_t end) {
-        double value = 0;
-        for (std::size_t i = begin; i < end; ++i)
-            value = std::fmax(value, std::abs(expected[i]));
-        return value;
-    };
-    const double axes = largest(0, kAxes);
-    const double translation = largest(kAxes, expected.size());
-    for (std::size_t i = 0; i < expected.size(); ++i) {
-        if (!closeTo(actual[i], expected[i], kEvaluatedTolerance, i < kAxes ? axes : translation))
-            return false;
-    }
-    return true;
-}
-
 std::string difference(const std::string& what, const Matrix12& actual, const Matrix12& expected) {
     return what + ": " + printed(actual.data(), actual.size()) + " instead of " +
            printed(expected.data(), expected.size());
@@ -180,7 +163,7 @@ void checkGeometricTransforms(LoadedFile& file, Findings& findings) {
         const ReferenceNode& expected = file.reference().nodes[i];
         const SceneNode* entry = file.nodeOf(i);
         const Matrix12 actual = entry ? asMatrix12(geometricMatrix(*entry->node)) : Matrix12{};
-        findings.compare(entry && sameMatrix(actual, expected.geometric), [&] {
+        findings.compare(entry && sameMatrix(actual, expected.geometric, kEvaluatedTolerance), [&] {
             return entry ? difference("\"" + expected.name + "\"", actual, expected.geometric) : missing(expected);
         });
     }
@@ -194,7 +177,7 @@ void checkWorldMatrices(LoadedFile& file, Findings& findings) {
         for (std::size_t f = 0; f < expected.world.size(); ++f) {
             const Matrix12 actual =
                 entry ? asMatrix12(worldMatrix(*entry->node, timeOfSeconds(reference.seconds(f)))) : Matrix12{};
-            findings.compare(entry && sameMatrix(actual, expected.world[f]), [&] {
+            findings.compare(entry && sameMatrix(actual, expected.world[f], kEvaluatedTolerance), [&] {
                 if (!entry)
                     return missing(expected);
                 return difference("\"" + expected.name + "\" at frame " + printed(reference.frames[f]), actual,

@@ -22,9 +22,13 @@ constexpr Row kRows[] = {
     {"deformedPoints", "points of skinned and cached meshes in the world", checkDeformedPoints},
     {"wavefront", "undeformed meshes against Wavefront files", checkWavefrontPoints},
     {"deformedWavefront", "skinned and cached meshes against Wavefront files", checkDeformedWavefrontPoints},
-    {"libraryMeshes", "meshes as the library hands them out", checkLibraryMeshes},
+    {"libraryMeshes", "meshes of the library, points where the mesh has them", checkLibraryMeshes},
     {"libraryLocalSamples", "local transform samples of the library", checkLibraryLocalSamples},
-    {"libraryPositions", "positions in the world of the library", checkLibraryPositions},
+    {"libraryWorldTransforms", "places in the world, as the library hands them out by default",
+     checkLibraryWorldTransforms},
+    {"libraryBakedMeshes", "meshes in the world, as the library hands them out by default", checkLibraryBakedMeshes},
+    {"libraryCameras", "cameras, as the library hands them out by default", checkLibraryCameras},
+    {"libraryLights", "lights, as the library hands them out by default", checkLibraryLights},
     {"nurbsSurfaces", "NURBS surfaces: points of Wavefront files and of our meshes lie on them", checkNurbsSurfaces},
 };
 
