@@ -263,6 +263,17 @@ TEST(TwoStacksFixture, GiveTheFirstOneFromItsFrameOn) {
     }
 }
 
+TEST(TwoStacksFixture, GiveTheFirstOneAlsoWhenTheSecondIsAskedFor) {
+    for (TnFbxReadInfo info :
+         {test::localRead(fixture("two_stacks_7400_ascii.fbx")), worldRead("two_stacks_7400_ascii.fbx")}) {
+        info.setAnimationStackName("run");
+        FacadeRead<TnFbxNull> nulls(info);
+
+        EXPECT_EQ(samplesOf(nulls["node"], kX), Samples({1, 3, 5}));
+        expectRange(nulls["node"].getTransformTime(kX), 1001, 1003, 24.0f);
+    }
+}
+
 TEST(TwoStacksFixture, HaveTheRangeOfTheFirstOne) {
     float start = 0.0f, end = 0.0f;
     ASSERT_TRUE(Fbx().getAnimationFrameRange(fixture("two_stacks_7400_ascii.fbx").c_str(), start, end));
