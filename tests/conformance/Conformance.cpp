@@ -3,7 +3,7 @@
 //
 // Reads every file of the corpus, compares it with its reference and prints a table. Fails when a row agrees less than
 // expected.json says, or when the files that differ are not those listed there. With --through every file is written
-// anew first, and its copy must agree with the reference as well as the file itself does.
+// anew as well, and its copies must agree with the reference as well as the file itself does.
 #include "Corpus.h"
 #include "Expectations.h"
 #include "Rewriting.h"
@@ -14,6 +14,7 @@
 #include <cstdio>
 #include <cstring>
 #include <exception>
+#include <memory>
 
 namespace conformance {
 namespace {
@@ -24,15 +25,15 @@ constexpr std::size_t kDifferencesPerFile = 1;
 constexpr std::size_t kAllDifferences = 1000;
 
 constexpr const char* kUsageText =
-    "usage: conformance [--file NAME] [--update] [--quiet] [--through VERSION:ENCODING]\n"
+    "usage: conformance [--file NAME] [--update] [--quiet] [--through VERSION:ENCODING]…\n"
     "  --file NAME  all differences of one file\n"
     "  --update     write the numbers of this run to expected.json\n"
     "  --quiet      the table and the violations only\n"
-    "  --through    check copies, written for example as FBX201400:binary\n";
+    "  --through    check copies, written for example as FBX201400:binary; once for each form\n";
 
 struct Options {
     std::string file;
-    std::string through;
+    std::vector<std::string> through;
     bool update = false;
     bool quiet = false;
 };
@@ -46,7 +47,7 @@ bool parse(int argc, char** argv, Options& options) {
         else if (std::strcmp(argv[i], "--file") == 0 && i + 1 < argc)
             options.file = argv[++i];
         else if (std::strcmp(argv[i], "--through") == 0 && i + 1 < argc && parseWrittenForm(argv[i + 1]))
-            options.through = argv[++i];
+            options.through.emplace_back(argv[++i]);
         else
             return false;
     }
@@ -133,29 +134,50 @@ int judge(const Options& options, const Results& results) {
     return violations.empty() ? 0 : 1;
 }
 
-/// Checks the copies of all files against the files.
-int runThrough(const Options& options, const std::filesystem::path& corpus) {
-    const RewrittenCorpus rewritten(corpus, *parseWrittenForm(options.through));
-    RoundTrip roundTrip(TARNELL_CONFORMANCE_REWRITTEN, options.through);
+/// The copies of all files in one form, and how they compare.
+struct CopiedCorpus {
+    RewrittenCorpus files;
+    RoundTrip comparison;
+
+    CopiedCorpus(const std::filesystem::path& corpus, const std::string& form)
+        : files(corpus, *parseWrittenForm(form)), comparison(TARNELL_CONFORMANCE_REWRITTEN, form) {}
+};
+
+/// Checks one file, and its copies against it.
+void checkCopies(const CorpusFile& file, const Options& options,
+                 const std::vector<std::unique_ptr<CopiedCorpus>>& forms) {
     Options silent = options;
     silent.quiet = true;
-    for (const CorpusFile& file : listCorpus(corpus)) {
-        if (!options.file.empty() && file.name != options.file)
-            continue;
-        const std::optional<CorpusFile> copy = rewritten.rewrite(file);
-        if (!copy)
-            continue;
-        Results before, after;
-        checkFile(file, silent, before);
-        checkFile(*copy, options, after);
-        roundTrip.add(file.name, before, after);
+    Results before;
+    checkFile(file, silent, before);
+    for (const std::unique_ptr<CopiedCorpus>& form : forms) {
+        if (const std::optional<CorpusFile> copy = form->files.rewrite(file)) {
+            Results after;
+            checkFile(*copy, options, after);
+            form->comparison.add(file.name, before, after);
+        }
     }
-    roundTrip.print();
-    const std::vector<std::string> violations =
-        options.file.empty() ? roundTrip.violations() : std::vector<std::string>();
-    for (const std::string& violation : violations)
-        std::printf("FAILED %s\n", violation.c_str());
-    return violations.empty() ? 0 : 1;
+}
+
+/// Checks the copies of all files, in every form, against the files.
+int runThrough(const Options& options, const std::filesystem::path& corpus) {
+    std::vector<std::unique_ptr<CopiedCorpus>> forms;
+    for (const std::string& form : options.through)
+        forms.push_back(std::make_unique<CopiedCorpus>(corpus, form));
+    for (const CorpusFile& file : listCorpus(corpus)) {
+        if (options.file.empty() || file.name == options.file)
+            checkCopies(file, options, forms);
+    }
+    bool failed = false;
+    for (const std::unique_ptr<CopiedCorpus>& form : forms) {
+        form->comparison.print();
+        const std::vector<std::string> violations =
+            options.file.empty() ? form->comparison.violations() : std::vector<std::string>();
+        for (const std::string& violation : violations)
+            std::printf("FAILED %s\n", violation.c_str());
+        failed = failed || !violations.empty();
+    }
+    return failed ? 1 : 0;
 }
 
 int run(const Options& options) {

@@ -107,7 +107,6 @@ void checkLibraryMeshes(LoadedFile& file, Findings& findings) {
     if (!file.loaded())
         return;
     TnFbxReadInfo info;
-    info.setGlobalTransform(false);
     info.setTransformPoints(false);
     const auto list = read<TnFbxMesh>(file, info, &Fbx::getMeshes, findings);
     for (const Handed<TnFbxMesh>& handed : matched(file, list.span(), kMeshTypes, findings)) {
