@@ -178,5 +178,30 @@ TEST(BlendShapes, ComeBeforeTheSkin) {
     expectPoint(deformed(scene, scene.node)[0], 10.0, 3.0, 0.0);
 }
 
+TEST(BlendShapes, OfAMeshAreThoseOfTheFrameInSinglePrecision) {
+    ShapeScene scene;
+    fbxsdk::FbxBlendShapeChannel* channel = scene.addChannel();
+    scene.addTarget(channel, 1.0);
+    fbxsdk::FbxAnimCurve* curve =
+        scene.key(channel->DeformPercent, nullptr, {{0, 5.0f}, {10, 20.0f}, {12, 30.0f}, {14, 40.0f}});
+    for (int key = 0; key < 4; ++key) {
+        curve->KeySetInterpolation(key, fbxsdk::FbxAnimCurveDef::eInterpolationConstant);
+    }
+    const auto heightAt = [&scene](float frame) {
+        TnFbxReadInfo info = readAll();
+        info.setTransformPoints(false);
+        info.setFrame(frame);
+        TnFbxMesh mesh;
+        EXPECT_TRUE(scene.sdk.getMeshes(info, &mesh, 1));
+        float x = 0.0f, y = 0.0f, z = 0.0f;
+        EXPECT_TRUE(mesh.getControlPoint(0, x, y, z));
+        return y;
+    };
+
+    EXPECT_EQ(heightAt(9.0f), 5.0f);
+    EXPECT_EQ(heightAt(10.0f), 5.0f) << "10/24 s is less in single precision, and the key not yet reached";
+    EXPECT_EQ(heightAt(12.0f), 30.0f) << "12/24 s is exact";
+}
+
 } // namespace
 } // namespace Tarnell::Fbx

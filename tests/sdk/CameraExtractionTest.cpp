@@ -189,6 +189,25 @@ TEST(CameraExtraction, ComputesTheRotationForEveryFrameOfAnimatedIngredients) {
     EXPECT_EQ(rotationOf(camera), Samples({77.0f, 77.0f, 77.0f})); // no static values
 }
 
+TEST(CameraExtraction, ComputesTheRotationOnceForIngredientsThatStartAtFrameTenMillion) {
+    TestScene scene;
+    fbxsdk::FbxNode* node = addCamera(scene);
+    fbxsdk::FbxNode* target = scene.addNode("target");
+    target->LclTranslation.Set({0.0, 0.0, -10.0});
+    node->SetTarget(target);
+    for (const int start : {9999999, 10000000}) {
+        SCOPED_TRACE(start);
+        TnFbxTime time = timeRecord(start, start + 1, 24.0f);
+        fbxsdk::FbxAMatrix geometric;
+        Camera camera;
+
+        EXPECT_TRUE(scene.sdk.getCamera(time, /*global*/ true, false, 0.0f, false, node, camera, geometric));
+
+        EXPECT_TRUE(camera.getAnimated(Camera::kFbxCameraLookAtPositionX));
+        EXPECT_EQ(camera.getTransformAnimated(kRotationX), start == 9999999);
+    }
+}
+
 TEST(CameraExtraction, GivesAComputedRotationTheRateOfItsLastAnimatedIngredient) {
     TestScene scene(0, 2);
     fbxsdk::FbxNode* node = addCamera(scene);
@@ -240,6 +259,21 @@ TEST(CameraExtraction, LooksAtTheTargetInTheWorld) {
     test::expectRange(camera.getTime(Camera::kFbxCameraLookAtPositionX), 0, 2, 24.0f);
     EXPECT_FLOAT_EQ(camera.getTransformValueAt(kRotationY, 1.0f), -45.0f);
     EXPECT_EQ(camera.getTransformRotationOrder(), Transform::kFbxRotationOrderZXY);
+}
+
+TEST(CameraExtraction, LooksAtTheTargetWithoutItsOwnGeometricTransform) {
+    TestScene scene(0, 2);
+    fbxsdk::FbxNode* node = addCamera(scene);
+    node->SetGeometricTranslation(fbxsdk::FbxNode::eSourcePivot, fbxsdk::FbxVector4(5.0, 0.0, 0.0));
+    fbxsdk::FbxNode* target = scene.addNode("target");
+    target->LclTranslation.Set({1.0, 2.0, 3.0});
+    node->SetTarget(target);
+    TnFbxReadInfo info = test::readNamed("shot", /*global*/ true);
+    Camera camera;
+
+    EXPECT_TRUE(scene.sdk.getCameras(info, &camera, 1));
+
+    EXPECT_EQ(camera.getValue(Camera::kFbxCameraLookAtPositionX), 1.0f);
 }
 
 TEST(CameraExtraction, TakesItsOwnTranslationForTheTargetsWhenReadLocally) {
@@ -647,6 +681,34 @@ TEST(ProducerCamera, IsReadStaticallyUnderTheGivenName) {
     EXPECT_EQ(camera.getApertureMode(), Camera::kFbxApertureFocalLength); // not read
     EXPECT_EQ(camera.getValue(Camera::kFbxCameraFilmOffsetX), 0.0f);      // not read
     EXPECT_FALSE(camera.getAnimated(Camera::kFbxCameraRoll));
+}
+
+TEST(ProducerCamera, LooksWhereTheObjectsOwnSamplesLeadAtFrameZero) {
+    TestScene scene;
+    fbxsdk::FbxCamera* source = fbxsdk::FbxCamera::Create(scene.scene, "source");
+    source->InterestPosition.Set({0.0, 0.0, -10.0});
+    Camera camera;
+    ASSERT_TRUE(camera.setValueAt(Camera::kFbxCameraRoll, timeRecord(0, 1, 24.0f), Samples({10.0f, 40.0f})));
+
+    EXPECT_TRUE(scene.sdk.getProducerCamera(nullptr, source, camera, "name"));
+
+    EXPECT_EQ(rotationOf(camera), rotationAt(camera, 0.0f));
+    EXPECT_NEAR(camera.getTransformValue(kRotationZ), -10.0f, 1e-3f);
+}
+
+TEST(ProducerCamera, SetsTheTransformOrder) {
+    TestScene scene;
+    fbxsdk::FbxNode* node = addCamera(scene);
+    Camera producer, camera;
+    const auto other = static_cast<Transform::EFbxTransformTransformOrder>(3);
+    producer.setTransformTransformOrder(other);
+    camera.setTransformTransformOrder(other);
+
+    EXPECT_TRUE(scene.sdk.getProducerCamera(node, node->GetCamera(), producer, "name"));
+    EXPECT_TRUE(readInto(scene, node, camera));
+
+    EXPECT_EQ(producer.getTransformTransformOrder(), Transform::kFbxTransformOrderDefault);
+    EXPECT_EQ(camera.getTransformTransformOrder(), Transform::kFbxTransformOrderDefault) << "other cameras as well";
 }
 
 TEST(ProducerCamera, WithoutANodeTurnsInTheOrderZXY) {

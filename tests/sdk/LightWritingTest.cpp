@@ -67,11 +67,11 @@ TEST(LightWriting, TurnsIntensityIntoPercentButNotTheDefaultOfTheCurve) {
 
 TEST(LightWriting, DividesTheIntensityInSinglePrecision) {
     LightScene scene(Light::kFbxLightPoint);
-    scene.light.setValue(Light::kFbxLightIntensity, 0.7f);
+    scene.light.setValue(Light::kFbxLightIntensity, 0.09f); // 0.09 · 100 is 9 exactly
 
     EXPECT_TRUE(scene.write());
 
-    EXPECT_EQ(scene.target->Intensity.Get(), static_cast<double>(0.7f / 0.01f));
+    EXPECT_EQ(scene.target->Intensity.Get(), 9.000000953674316);
 }
 
 TEST(LightWriting, WritesTheConeOfSpotLightsOnly) {

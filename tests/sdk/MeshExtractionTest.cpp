@@ -6,6 +6,7 @@
 
 #include <gmock/gmock.h>
 
+#include <cmath>
 #include <limits>
 
 namespace Tarnell::Fbx {
@@ -223,6 +224,24 @@ TEST(MeshBaking, AppliesTheAnglesOfTheOriginInTheOrderXYZ) {
                {0.0f, 90.0f, 90.0f});
     expectNear(pointOf(mesh, 2), {-1.0f, 0.0f, -1.0f});
     expectNear(normalOf(mesh, 0), {-1.0f, 2.0f, 0.0f});
+}
+
+TEST(MeshBaking, IsFalsifiedAtTheOriginByOneAngleOrAMirroredAxisAlone) {
+    const float half = std::sqrt(3.0f);
+    for (const double offset : {0.0, 1e-9}) {
+        SCOPED_TRACE(offset);
+        TestScene scene;
+        fbxsdk::FbxNode* node = addTwoPolygons(scene);
+        node->LclTranslation.Set({offset, 0.0, 0.0});
+        const bool right = offset != 0.0;
+
+        node->LclRotation.Set({120.0, 0.0, 0.0}); // 60, 180, 180 at the origin: in the order XYZ that is −120 about X
+        expectNear(pointOf(readMesh(scene, node, {/*transformPoints*/ true, /*global*/ true}), 4),
+                   {0.0f, -1.0f, right ? half : -half});
+        node->LclRotation.Set({0.0, 0.0, 0.0});
+        node->LclScaling.Set({1.0, -1.0, 1.0}); // half a turn about Z and three negative scales there
+        expectNear(pointOf(readMesh(scene, node, {true, true}), 2), {1.0f, right ? -1.0f : 1.0f, 0.0f});
+    }
 }
 
 TEST(MeshExtraction, PassesOnNumbersThatAreNone) {

@@ -310,6 +310,22 @@ TEST(GlobalLightSettings, AreAnOrangeAmbientAndAMagentaFog) {
     expectColour(settings.GetFogColor(), 1.0, 0.0, 1.0, 1.0);
 }
 
+TEST(GlobalLightSettings, ReplaceThoseThatTheSceneHad) {
+    WrittenScene scene;
+    fbxsdk::FbxGlobalLightSettings& settings = scene.scene->GlobalLightSettings();
+    settings.SetFogMode(fbxsdk::FbxGlobalLightSettings::eExponential);
+    settings.SetFogDensity(0.5);
+    settings.SetFogStart(10.0);
+    settings.SetFogEnd(20.0);
+
+    EXPECT_TRUE(scene.sdk.setGlobalLightSettings(scene.scene));
+
+    EXPECT_EQ(settings.GetFogMode(), fbxsdk::FbxGlobalLightSettings::eLinear);
+    EXPECT_EQ(settings.GetFogDensity(), 0.002);
+    EXPECT_EQ(settings.GetFogStart(), 0.0);
+    EXPECT_EQ(settings.GetFogEnd(), 1000.0);
+}
+
 TEST(GlobalCameraSettings, AreTheSwitcherAndTheProducerCameras) {
     WrittenScene scene;
 

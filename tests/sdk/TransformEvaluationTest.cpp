@@ -400,6 +400,23 @@ TEST(GlobalTransform, DecomposesDifferentlyAtTheOriginAndBesideIt) {
     }
 }
 
+TEST(GlobalTransform, IsBesideTheOriginHoweverNearItStands) {
+    TestScene scene(0, 0);
+    fbxsdk::FbxNode* node = scene.addNode("node");
+    node->LclRotation.Set({90.0, 40.0, 0.0});
+    for (int axis = 0; axis < 3; ++axis) {
+        SCOPED_TRACE(axis);
+        fbxsdk::FbxDouble3 step;
+        step[axis] = 1e-300; // zero as a float
+        node->LclTranslation.Set(step);
+
+        const Transform transform = readTransform(scene, node, true, scene.time());
+
+        expectStatic(transform, kPositionX, 0.0f, 0.0f, 0.0f);
+        expectStatic(transform, kRotationX, 90.0f, 40.0f, 0.0f, kDegreesTolerance);
+    }
+}
+
 TEST(GlobalTransform, DecomposesBesideTheOriginWhatAGeometricTranslationMovesThere) {
     TestScene scene(0, 0);
     fbxsdk::FbxNode* node = scene.addNode("node");
