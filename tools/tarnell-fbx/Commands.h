@@ -12,7 +12,12 @@
 
 namespace tool {
 
-enum ExitStatus { kSuccess = 0, kUnreadable = 1, kWrongUsage = 2 };
+enum ExitStatus {
+    kSuccess = 0,
+    kUnreadable = 1, ///< something could not be read or written
+    kWrongUsage = 2,
+    kLosses = 3 ///< done, and with --strict: not everything came over
+};
 
 struct DumpOptions {
     std::string file;
@@ -40,6 +45,43 @@ struct ConvertOptions {
     PointCache cache = PointCache::maya;
     bool local = false;
     bool force = false;
+    bool strict = false; ///< what does not come over makes the status kLosses
+};
+
+enum class Form { text, json, jsonLines, csv, plot };
+
+/// What the commands that look into files have in common.
+struct LookOptions {
+    std::vector<std::string> files; ///< names and patterns
+    Form form = Form::text;
+    int jobs = 1; ///< files at the same time
+};
+
+struct TreeOptions : LookOptions {
+    int depth = 0; ///< levels; 0: all
+};
+
+struct PropsOptions : LookOptions {
+    std::string object;
+    std::string take;
+    bool all = false; ///< those that the file leaves at their defaults, too
+};
+
+struct CurveOptions : LookOptions {
+    std::string target; ///< NODE or NODE.PROPERTY
+    std::string take;
+    std::optional<std::pair<int, int>> frames; ///< sampled at every whole frame of the range
+};
+
+struct CacheOptions : LookOptions {
+    bool verify = false;
+    bool samples = false; ///< every sample in the JSON document
+};
+
+struct RecordsOptions : LookOptions {
+    std::string path; ///< names of records, from the top: "Objects/Model"
+    int depth = 0;    ///< levels; 0: all
+    int values = 8;   ///< shown of a list; 0: all
 };
 
 /// The names of the kinds that dump knows, in the order in which it prints them.
@@ -47,13 +89,24 @@ const std::vector<std::string>& dumpKinds();
 
 int dump(const DumpOptions& options);
 int convert(const ConvertOptions& options);
-int info(const std::vector<std::string>& files);
+int info(const LookOptions& options);
+int tree(const TreeOptions& options);
+int props(const PropsOptions& options);
+int curve(const CurveOptions& options);
+int cache(const CacheOptions& options);
+int records(const RecordsOptions& options);
 
 /// One line on standard error, as every failure of the tool prints it.
 void printError(const std::string& file, const std::string& reason);
 
-/// Runs work on a file, and hands out its exit status. What the work throws is a failure like any other: the reason is
-/// printed, and the status is kUnreadable.
+struct Outcome {
+    int status = kSuccess;
+    std::string reason; ///< why work ended before its time; empty when it did not
+};
+/// Runs work. What it throws is a failure like any other, with the status kUnreadable; OutputFailure goes through.
+Outcome attempt(const std::function<int()>& work);
+
+/// Runs work on a file, and hands out its exit status. Why it failed is printed.
 int guarded(const std::string& file, const std::function<int()>& work);
 
 } // namespace tool

@@ -10,10 +10,9 @@
 #include <set>
 #include <type_traits>
 
-#include <unistd.h>
-
 #include "Commands.h"
 #include "Placement.h"
+#include "Progress.h"
 #include "Resampling.h"
 
 #include "Fbx.h"
@@ -32,33 +31,6 @@ namespace {
 
 using namespace Tarnell::Fbx;
 namespace filesystem = std::filesystem;
-
-/// A line that is overwritten while work goes on; nothing when standard error is a file.
-class Progress {
-public:
-    Progress() : mShown(isatty(STDERR_FILENO) == 1) {}
-    ~Progress() { clear(); }
-    Progress(const Progress&) = delete;
-    Progress& operator=(const Progress&) = delete;
-
-    void say(const std::string& text) {
-        if (!mShown)
-            return;
-        clear();
-        std::cerr << text << std::flush;
-        mLength = text.size();
-    }
-
-private:
-    void clear() {
-        if (mLength > 0)
-            std::cerr << '\r' << std::string(mLength, ' ') << '\r' << std::flush;
-        mLength = 0;
-    }
-
-    bool mShown;
-    std::size_t mLength = 0;
-};
 
 /// The objects of one kind, and the pointers by which the facade writes them.
 template <class Object>
@@ -392,7 +364,7 @@ int convert(const ConvertOptions& options) {
         for (const std::string& warning : lastWarnings())
             printError(options.output, warning);
         if (written)
-            return kSuccess;
+            return options.strict && !conversion.losses().empty() ? kLosses : kSuccess;
         printError(options.output, lastError());
         return kUnreadable;
     });

@@ -7,24 +7,32 @@
 #include <new>
 
 #include "Commands.h"
+#include "TerminalText.h"
 
 namespace tool {
 
 void printError(const std::string& file, const std::string& reason) {
     // The library's sentences begin with the file already.
     const bool named = reason.rfind(file + ": ", 0) == 0;
-    std::cerr << "tarnell-fbx: " << (named ? "" : file + ": ") << reason << '\n';
+    // In one piece: several files may fail at once.
+    std::cerr << "tarnell-fbx: " + terminalText(named ? reason : file + ": " + reason) + '\n';
+}
+
+Outcome attempt(const std::function<int()>& work) {
+    try {
+        return {work(), {}};
+    } catch (const std::bad_alloc&) {
+        return {kUnreadable, "there is not enough memory"};
+    } catch (const std::exception& error) {
+        return {kUnreadable, error.what()};
+    }
 }
 
 int guarded(const std::string& file, const std::function<int()>& work) {
-    try {
-        return work();
-    } catch (const std::bad_alloc&) {
-        printError(file, "there is not enough memory");
-    } catch (const std::exception& error) {
-        printError(file, error.what());
-    }
-    return kUnreadable;
+    const Outcome outcome = attempt(work);
+    if (!outcome.reason.empty())
+        printError(file, outcome.reason);
+    return outcome.status;
 }
 
 } // namespace tool

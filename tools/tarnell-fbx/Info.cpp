@@ -1,116 +1,155 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx info: one screen per file, for people. These are facts of the file itself, before any conversion, so they
-// come from the platform.
-#include <cstdio>
-#include <iostream>
+// tarnell-fbx info: one screen per file, for people, or a document. These are facts of the file itself, before any
+// conversion, so they come from the platform.
+#include <filesystem>
 #include <map>
-#include <memory>
-#include <sstream>
-
-#include <sys/stat.h>
+#include <system_error>
 
 #include <fbxsdk.h>
 
 #include "CacheCheck.h"
 #include "Commands.h"
+#include "SceneFacts.h"
+#include "SceneFile.h"
+#include "ShowFiles.h"
+#include "TerminalText.h"
 
 namespace tool {
 namespace {
 
-struct ManagerDeleter {
-    void operator()(FbxManager* manager) const { manager->Destroy(); }
+/// A stack of the file, its span in frames of the file's rate.
+struct Stack {
+    std::string name;
+    long long firstFrame, lastFrame;
+    double start, end; ///< seconds
+    std::vector<std::string> layers;
 };
 
-/// At most ten significant digits, none of them useless.
-std::string number(double value) {
-    char text[32];
-    std::snprintf(text, sizeof text, "%.10g", value);
-    return text;
+struct CacheFault {
+    std::string mesh, reason;
+};
+
+/// What info says about a file.
+struct Facts {
+    int version = 0;
+    bool ascii = false;
+    std::optional<std::uintmax_t> bytes;
+    std::string creator;
+    double unit = 1.0; ///< centimetres
+    Axes axes;
+    double frameRate = 0.0;
+    std::vector<Stack> stacks;
+    std::map<std::string, int> kinds;
+    std::vector<CacheFault> cacheFaults;
+    std::vector<std::string> repairs;
+};
+
+Stack stackFacts(const FbxAnimStack& stack, FbxTime::EMode mode) {
+    const FbxTimeSpan span = stack.GetLocalTimeSpan();
+    Stack facts{stack.GetName(),
+                span.GetStart().GetFrameCount(mode),
+                span.GetStop().GetFrameCount(mode),
+                span.GetStart().GetSecondDouble(),
+                span.GetStop().GetSecondDouble(),
+                {}};
+    for (int layer = 0; layer < stack.GetMemberCount<FbxAnimLayer>(); ++layer)
+        facts.layers.emplace_back(stack.GetMember<FbxAnimLayer>(layer)->GetName());
+    return facts;
 }
 
-std::string oneDecimal(double value) {
-    char text[32];
-    std::snprintf(text, sizeof text, "%.1f", value);
-    return text;
-}
-
-std::string sizeOf(const std::string& file) {
-    struct stat facts {};
-    if (stat(file.c_str(), &facts) != 0)
-        return "?";
-    const double bytes = static_cast<double>(facts.st_size);
-    if (bytes < 1024.0)
-        return std::to_string(facts.st_size) + " bytes";
-    if (bytes < 1024.0 * 1024.0)
-        return oneDecimal(bytes / 1024.0) + " KiB";
-    return oneDecimal(bytes / (1024.0 * 1024.0)) + " MiB";
-}
-
-std::string unitName(double centimetres) {
-    constexpr struct {
-        double scale;
-        const char* name;
-    } kUnits[] = {{0.1, "millimetre"}, {1.0, "centimetre"}, {10.0, "decimetre"}, {100.0, "metre"},  {1e5, "kilometre"},
-                  {2.54, "inch"},      {30.48, "foot"},     {91.44, "yard"},     {160934.4, "mile"}};
-    for (const auto& unit : kUnits) {
-        if (unit.scale == centimetres)
-            return unit.name;
+std::map<std::string, int> countKinds(FbxNode& root) {
+    std::map<std::string, int> counts;
+    std::vector<FbxNode*> pending{&root};
+    while (!pending.empty()) {
+        FbxNode* node = pending.back();
+        pending.pop_back();
+        for (int i = 0; i < node->GetChildCount(); ++i)
+            pending.push_back(node->GetChild(i));
+        if (node != &root)
+            ++counts[kindOf(*node)];
     }
-    return number(centimetres) + " cm";
+    return counts;
 }
 
-std::string axesName(const FbxAxisSystem& system) {
-    int upSign = 1, frontSign = 1;
-    const int up = static_cast<int>(system.GetUpVector(upSign)) - 1;
-    const bool even = system.GetFrontVector(frontSign) == FbxAxisSystem::eParityEven;
-    const int others[2] = {up == 0 ? 1 : 0, up == 2 ? 1 : 2};
-    const int front = even ? others[0] : others[1];
+const char* nameOf(const FbxMesh& mesh) {
+    return mesh.GetNodeCount() > 0 ? mesh.GetNode(0)->GetName() : mesh.GetName();
+}
+
+/// Meshes that show without their point cache, or with a damaged one, and why.
+std::vector<CacheFault> cacheFaults(FbxScene& scene) {
+    std::vector<CacheFault> faults;
+    for (int i = 0; i < scene.GetSrcObjectCount<FbxMesh>(); ++i) {
+        FbxMesh& mesh = *scene.GetSrcObject<FbxMesh>(i);
+        const std::string fault = cacheFault(mesh);
+        if (!fault.empty())
+            faults.push_back({nameOf(mesh), fault});
+    }
+    return faults;
+}
+
+Facts factsOf(const std::string& file, const SceneFile& opened) {
+    FbxScene& scene = opened.scene();
+    FbxGlobalSettings& settings = scene.GetGlobalSettings();
+    const FbxIOFileHeaderInfo& header = *opened.importer().GetFileHeaderInfo();
+    Facts facts;
+    facts.version = header.mFileVersion;
+    facts.ascii = header.mASCII;
+    std::error_code error;
+    const std::uintmax_t bytes = std::filesystem::file_size(file, error);
+    if (!error)
+        facts.bytes = bytes;
+    facts.creator = header.mCreator.Buffer();
+    facts.unit = settings.GetSystemUnit().GetScaleFactor();
+    facts.axes = axesOf(settings.GetAxisSystem());
+    facts.frameRate = opened.frameRate();
+    for (int i = 0; i < scene.GetSrcObjectCount<FbxAnimStack>(); ++i)
+        facts.stacks.push_back(stackFacts(*scene.GetSrcObject<FbxAnimStack>(i), opened.timeMode()));
+    facts.kinds = countKinds(*scene.GetRootNode());
+    facts.cacheFaults = cacheFaults(scene);
+    for (const FbxString& warning : header.mWarnings)
+        facts.repairs.emplace_back(warning.Buffer());
+    return facts;
+}
+
+// ---- For people ----
+
+/// Prints "  Label         text".
+class Lines {
+public:
+    Lines(std::ostream& out, const Terminal& terminal) : mOut(out), mTerminal(terminal) {}
+
+    void line(std::string_view label, const std::string& text) {
+        constexpr std::size_t kColumn = 14;
+        mOut << "  " << mTerminal.paint(Ink::faint, label)
+             << std::string(kColumn - std::min(kColumn, label.size()), ' ') << text << '\n';
+    }
+
+private:
+    std::ostream& mOut;
+    const Terminal& mTerminal;
+};
+
+std::string versionText(int version) {
+    const std::string text = std::to_string(version / 1000) + '.' + std::to_string(version / 100 % 10);
+    return version % 100 == 0 ? text : text + '.' + std::to_string(version % 100);
+}
+
+std::string stackText(const Stack& stack) {
+    std::string text = inQuotes(stack.name) + "  frames " + std::to_string(stack.firstFrame) + " to " +
+                       std::to_string(stack.lastFrame) + "  (" + numberText(stack.start) + " to " +
+                       numberText(stack.end) + " s)  layers:";
+    for (std::size_t i = 0; i < stack.layers.size(); ++i)
+        text += (i == 0 ? " " : ", ") + terminalText(stack.layers[i]);
+    return text;
+}
+
+std::string kindsText(const std::map<std::string, int>& kinds) {
     std::string text;
-    text += upSign < 0 ? '-' : '+';
-    text += "XYZ"[up];
-    text += " up, ";
-    text += frontSign < 0 ? '-' : '+';
-    text += "XYZ"[front];
-    text += " to the viewer, ";
-    text += system.GetCoorSystem() == FbxAxisSystem::eRightHanded ? "right-handed" : "left-handed";
-    return text;
-}
-
-const char* kindOf(const FbxNode& node) {
-    const FbxNodeAttribute* attribute = node.GetNodeAttribute();
-    if (!attribute)
-        return "node";
-    constexpr struct {
-        FbxNodeAttribute::EType type;
-        const char* name;
-    } kKinds[] = {{FbxNodeAttribute::eNull, "null"},
-                  {FbxNodeAttribute::eMarker, "marker"},
-                  {FbxNodeAttribute::eSkeleton, "bone"},
-                  {FbxNodeAttribute::eMesh, "mesh"},
-                  {FbxNodeAttribute::eNurbs, "NURBS"},
-                  {FbxNodeAttribute::ePatch, "patch"},
-                  {FbxNodeAttribute::eCamera, "camera"},
-                  {FbxNodeAttribute::eCameraStereo, "stereo camera"},
-                  {FbxNodeAttribute::eCameraSwitcher, "camera switcher"},
-                  {FbxNodeAttribute::eLight, "light"},
-                  {FbxNodeAttribute::eOpticalReference, "optical reference"},
-                  {FbxNodeAttribute::eOpticalMarker, "optical marker"},
-                  {FbxNodeAttribute::eNurbsCurve, "NURBS curve"},
-                  {FbxNodeAttribute::eTrimNurbsSurface, "trimmed NURBS surface"},
-                  {FbxNodeAttribute::eBoundary, "boundary"},
-                  {FbxNodeAttribute::eNurbsSurface, "NURBS surface"},
-                  {FbxNodeAttribute::eShape, "shape"},
-                  {FbxNodeAttribute::eLODGroup, "level-of-detail group"},
-                  {FbxNodeAttribute::eSubDiv, "subdivision surface"},
-                  {FbxNodeAttribute::eCachedEffect, "cached effect"},
-                  {FbxNodeAttribute::eLine, "line"}};
-    for (const auto& kind : kKinds) {
-        if (kind.type == attribute->GetAttributeType())
-            return kind.name;
-    }
-    return "unknown attribute";
+    for (const auto& [kind, count] : kinds)
+        text += (text.empty() ? "" : ", ") + std::to_string(count) + " × " + kind;
+    return text.empty() ? "none" : text;
 }
 
 /// A node of the tree on its way to the screen.
@@ -122,7 +161,7 @@ struct TreeLine {
 /// More nodes than this are counted, not listed.
 constexpr int kMaximumTreeLines = 200;
 
-void printTree(FbxNode& root, std::ostream& out) {
+void printTree(FbxNode& root, std::ostream& out, const Terminal& terminal) {
     std::vector<TreeLine> pending;
     const auto pushChildren = [&](FbxNode& node, const std::string& indent) {
         for (int i = node.GetChildCount() - 1; i >= 0; --i)
@@ -134,7 +173,8 @@ void printTree(FbxNode& root, std::ostream& out) {
         const TreeLine line = pending.back();
         pending.pop_back();
         if (printed < kMaximumTreeLines) {
-            out << "  " << line.indent << line.node->GetName() << "  [" << kindOf(*line.node) << "]\n";
+            out << "  " << line.indent << terminal.paint(Ink::name, terminalText(line.node->GetName())) << "  ["
+                << kindOf(*line.node) << "]\n";
             ++printed;
         } else {
             ++left;
@@ -146,108 +186,112 @@ void printTree(FbxNode& root, std::ostream& out) {
         out << "    … and " << left << " more\n";
 }
 
-std::string countKinds(FbxNode& root) {
-    std::map<std::string, int> counts;
-    std::vector<FbxNode*> pending{&root};
-    while (!pending.empty()) {
-        FbxNode* node = pending.back();
-        pending.pop_back();
-        for (int i = 0; i < node->GetChildCount(); ++i)
-            pending.push_back(node->GetChild(i));
-        if (node != &root)
-            ++counts[kindOf(*node)];
-    }
-    std::string text;
-    for (const auto& [kind, count] : counts) {
-        text += (text.empty() ? "" : ", ") + std::to_string(count) + " × " + kind;
-    }
-    return text.empty() ? "none" : text;
+void printText(const Facts& facts, FbxNode& root, Page& page) {
+    std::ostream& out = page.begin();
+    Lines lines(out, page.terminal());
+    out << page.terminal().paint(Ink::heading, terminalText(page.file())) << '\n';
+    lines.line("File version", versionText(facts.version) + (facts.ascii ? ", ASCII" : ", binary") +
+                                   (facts.bytes ? ", " + sizeText(*facts.bytes) : ""));
+    lines.line("Creator", facts.creator.empty() ? "not stated" : terminalText(facts.creator));
+    lines.line("Unit", unitName(facts.unit));
+    lines.line("Axes", facts.axes.up + " up, " + facts.axes.toViewer + " to the viewer, " +
+                           (facts.axes.rightHanded ? "right-handed" : "left-handed"));
+    lines.line("Frame rate", numberText(facts.frameRate) + " frames per second");
+    if (facts.stacks.empty())
+        lines.line("Stacks", "none");
+    for (std::size_t i = 0; i < facts.stacks.size(); ++i)
+        lines.line(i == 0 ? "Stacks" : "", stackText(facts.stacks[i]));
+    lines.line("Nodes", kindsText(facts.kinds));
+    printTree(root, out, page.terminal());
+    for (const CacheFault& fault : facts.cacheFaults)
+        lines.line("Cache", inQuotes(fault.mesh) + " cannot use its point cache: " + terminalText(fault.reason));
+    for (const std::string& repair : facts.repairs)
+        lines.line("Repaired", terminalText(repair));
 }
 
-void printStacks(FbxScene& scene, std::ostream& out) {
-    const FbxTime::EMode mode = scene.GetGlobalSettings().GetTimeMode();
-    const int count = scene.GetSrcObjectCount<FbxAnimStack>();
-    if (count == 0)
-        out << "  Stacks        none\n";
-    for (int i = 0; i < count; ++i) {
-        FbxAnimStack& stack = *scene.GetSrcObject<FbxAnimStack>(i);
-        const FbxTimeSpan span = stack.GetLocalTimeSpan();
-        out << (i == 0 ? "  Stacks        " : "                ") << '"' << stack.GetName() << "\"  frames "
-            << span.GetStart().GetFrameCount(mode) << " to " << span.GetStop().GetFrameCount(mode) << "  ("
-            << number(span.GetStart().GetSecondDouble()) << " to " << number(span.GetStop().GetSecondDouble()) << " s"
-            << ")  layers:";
-        for (int layer = 0; layer < stack.GetMemberCount<FbxAnimLayer>(); ++layer) {
-            out << (layer == 0 ? " " : ", ") << stack.GetMember<FbxAnimLayer>(layer)->GetName();
-        }
-        out << '\n';
+// ---- For programs ----
+
+void printStacks(const std::vector<Stack>& stacks, JsonWriter& json) {
+    json.key("stacks");
+    json.beginArray();
+    for (const Stack& stack : stacks) {
+        json.beginObject();
+        json.text("name", stack.name);
+        json.integer("firstFrame", stack.firstFrame);
+        json.integer("lastFrame", stack.lastFrame);
+        json.real("start", stack.start);
+        json.real("end", stack.end);
+        json.key("layers");
+        json.beginArray();
+        for (const std::string& layer : stack.layers)
+            json.text(layer);
+        json.endArray();
+        json.endObject();
     }
+    json.endArray();
 }
 
-const char* nameOf(const FbxMesh& mesh) {
-    return mesh.GetNodeCount() > 0 ? mesh.GetNode(0)->GetName() : mesh.GetName();
+void printSettings(const Facts& facts, JsonWriter& json) {
+    json.key("unit");
+    json.beginObject();
+    json.real("centimetres", facts.unit);
+    json.text("name", unitName(facts.unit));
+    json.endObject();
+    json.key("axes");
+    json.beginObject();
+    json.text("up", facts.axes.up);
+    json.text("toViewer", facts.axes.toViewer);
+    json.text("handedness", facts.axes.rightHanded ? "right" : "left");
+    json.endObject();
+    json.real("frameRate", facts.frameRate);
 }
 
-/// Meshes that show without their point cache, or with a damaged one, and why.
-void printCacheFaults(FbxScene& scene, std::ostream& out) {
-    for (int i = 0; i < scene.GetSrcObjectCount<FbxMesh>(); ++i) {
-        FbxMesh& mesh = *scene.GetSrcObject<FbxMesh>(i);
-        const std::string fault = cacheFault(mesh);
-        if (!fault.empty())
-            out << "  Cache         \"" << nameOf(mesh) << "\" cannot use its point cache: " << fault << '\n';
+void printJson(const Facts& facts, JsonWriter& json) {
+    json.integer("version", facts.version);
+    json.text("encoding", facts.ascii ? "ascii" : "binary");
+    json.key("bytes");
+    if (facts.bytes) {
+        json.integer(static_cast<long long>(*facts.bytes));
+    } else {
+        json.null();
     }
-}
-
-void printFile(const std::string& file, FbxImporter& importer, FbxScene& scene, std::ostream& out) {
-    int major = 0, minor = 0, revision = 0;
-    importer.GetFileVersion(major, minor, revision);
-    const FbxIOFileHeaderInfo* header = importer.GetFileHeaderInfo();
-    FbxGlobalSettings& settings = scene.GetGlobalSettings();
-    const double rate = FbxTime::GetFrameRate(settings.GetTimeMode());
-
-    out << file << '\n';
-    out << "  File version  " << major << '.' << minor << (revision ? "." + std::to_string(revision) : std::string())
-        << (header && header->mASCII ? ", ASCII" : ", binary") << ", " << sizeOf(file) << '\n';
-    out << "  Creator       " << (header && !header->mCreator.IsEmpty() ? header->mCreator.Buffer() : "not stated")
-        << '\n';
-    out << "  Unit          " << unitName(settings.GetSystemUnit().GetScaleFactor()) << '\n';
-    out << "  Axes          " << axesName(settings.GetAxisSystem()) << '\n';
-    out << "  Frame rate    " << number(rate) << " frames per second\n";
-    printStacks(scene, out);
-    out << "  Nodes         " << countKinds(*scene.GetRootNode()) << '\n';
-    printTree(*scene.GetRootNode(), out);
-    printCacheFaults(scene, out);
-    if (!header)
-        return;
-    for (const FbxString& warning : header->mWarnings)
-        out << "  Repaired      " << warning.Buffer() << '\n';
-}
-
-bool showFile(const std::string& file) {
-    const std::unique_ptr<FbxManager, ManagerDeleter> manager(FbxManager::Create());
-    FbxImporter* importer = FbxImporter::Create(manager.get(), "");
-    FbxScene* scene = FbxScene::Create(manager.get(), "");
-    if (!importer->Initialize(file.c_str(), -1, nullptr) || !importer->Import(scene, false)) {
-        printError(file, importer->GetStatus().GetErrorString());
-        return false;
+    json.text("creator", facts.creator);
+    printSettings(facts, json);
+    printStacks(facts.stacks, json);
+    json.key("nodes");
+    json.beginObject();
+    for (const auto& [kind, count] : facts.kinds)
+        json.integer(kind, count);
+    json.endObject();
+    json.key("cacheFaults");
+    json.beginArray();
+    for (const CacheFault& fault : facts.cacheFaults) {
+        json.beginObject();
+        json.text("mesh", fault.mesh);
+        json.text("reason", fault.reason);
+        json.endObject();
     }
-    std::ostringstream page;
-    printFile(file, *importer, *scene, page);
-    std::cout << page.str();
-    return true;
+    json.endArray();
+    json.key("repaired");
+    json.beginArray();
+    for (const std::string& repair : facts.repairs)
+        json.text(repair);
+    json.endArray();
 }
 
 } // namespace
 
-int info(const std::vector<std::string>& files) {
-    bool allRead = true;
-    for (std::size_t i = 0; i < files.size(); ++i) {
-        if (i > 0)
-            std::cout << '\n';
-        const int status = guarded(files[i], [&]() -> int { return showFile(files[i]) ? kSuccess : kUnreadable; });
-        allRead = status == kSuccess && allRead;
-    }
-    std::cout << std::flush;
-    return allRead ? kSuccess : kUnreadable;
+int info(const LookOptions& options) {
+    return showFiles(options, "info", [](Page& page) -> int {
+        const SceneFile opened(page.file());
+        const Facts facts = factsOf(page.file(), opened);
+        if (page.isJson()) {
+            page.json("info", [&](JsonWriter& json) { printJson(facts, json); });
+        } else {
+            printText(facts, *opened.scene().GetRootNode(), page);
+        }
+        return kSuccess;
+    });
 }
 
 } // namespace tool

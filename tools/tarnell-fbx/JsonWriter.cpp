@@ -19,14 +19,6 @@ void JsonWriter::text(std::string_view value) {
     raw(nlohmann::json(std::string(value)).dump(-1, ' ', false, nlohmann::json::error_handler_t::replace));
 }
 
-void JsonWriter::real(float value) {
-    if (std::isfinite(value)) {
-        number(value);
-    } else {
-        null();
-    }
-}
-
 void JsonWriter::open(char bracket) {
     separate();
     mOut << bracket;

@@ -27,8 +27,19 @@ public:
     void text(std::string_view value);
     void null() { raw("null"); }
     void integer(long long value) { number(value); }
-    /// Shortest digits that read back as the same float; null for NaN and infinities.
-    void real(float value);
+    /// A number that is spelt already; null for what is no JSON number (NaN and infinities).
+    void digits(std::string_view spelling) { raw(spelling.find_first_of("in") == spelling.npos ? spelling : "null"); }
+    void natural(unsigned long long value) { number(value); }
+    void boolean(bool value) { raw(value ? "true" : "false"); }
+    /// Shortest digits that read back as the same number; null for NaN and infinities.
+    void real(float value) { finite(value); }
+    void real(double value) { finite(value); }
+
+    // A key and its value.
+    void text(std::string_view name, std::string_view value) { key(name), text(value); }
+    void integer(std::string_view name, long long value) { key(name), integer(value); }
+    void boolean(std::string_view name, bool value) { key(name), boolean(value); }
+    void real(std::string_view name, double value) { key(name), real(value); }
 
 private:
     void open(char bracket);
@@ -38,6 +49,14 @@ private:
     void raw(std::string_view characters) {
         separate();
         mOut << characters;
+    }
+    template <class Real>
+    void finite(Real value) {
+        if (std::isfinite(value)) {
+            number(value);
+        } else {
+            null();
+        }
     }
     template <class Number>
     void number(Number value) {

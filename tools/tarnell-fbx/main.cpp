@@ -7,14 +7,21 @@
 #include <cmath>
 #include <cstdio>
 #include <exception>
+#include <functional>
 #include <iostream>
 #include <map>
 #include <string_view>
 #include <system_error>
 
+#include <unistd.h>
+
 #include <CLI/CLI.hpp>
 
 #include "Commands.h"
+#include "LookCommands.h"
+#include "Similarity.h"
+#include "StandardOutput.h"
+#include "TerminalText.h"
 
 namespace {
 
@@ -25,19 +32,6 @@ std::optional<Number> parse(std::string_view text) {
     const char* const end = text.data() + text.size();
     const auto [rest, error] = std::from_chars(text.data(), end, number);
     return rest == end && error == std::errc() ? std::optional(number) : std::nullopt;
-}
-
-/// "A:B", or a single frame.
-std::string parseFrames(const std::string& text, std::optional<std::pair<int, int>>& frames) {
-    const std::size_t colon = text.find(':');
-    const std::optional<int> first = parse<int>(text.substr(0, colon));
-    const std::optional<int> last = colon == std::string::npos ? first : parse<int>(text.substr(colon + 1));
-    if (!first || !last)
-        return "not a range of frames: " + text;
-    if (*first > *last)
-        return "the range " + text + " ends before it starts";
-    frames = {*first, *last};
-    return {};
 }
 
 /// For options whose number the command line's own conversion would take as well when it is empty, NaN or infinite.
@@ -59,19 +53,6 @@ std::vector<std::string> parseKinds(const std::string& text, const std::vector<s
     return kinds;
 }
 
-void addFrames(CLI::App& command, std::optional<std::pair<int, int>>& frames, const char* help) {
-    command
-        .add_option_function<std::string>(
-            "--frames",
-            [&frames](const std::string& text) {
-                const std::string complaint = parseFrames(text, frames);
-                if (!complaint.empty())
-                    throw CLI::ValidationError("--frames", complaint);
-            },
-            help)
-        ->type_name("A:B");
-}
-
 void addDump(CLI::App& app, tool::DumpOptions& options) {
     CLI::App* dump = app.add_subcommand("dump", "Print what the library reads as one JSON document");
     dump->add_option("FILE", options.file, "The FBX file")->required();
@@ -82,9 +63,10 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
     dump->add_flag("--local", options.local, "Local transforms instead of global ones");
     dump->add_option("--frame", options.frame, "Frame at which static values and meshes are read")
         ->check(refuseUnlessFinite);
-    addFrames(*dump, options.frames, "A:B, meshes are read at every whole frame of the range");
+    tool::addFrames(*dump, options.frames, "A:B, meshes are read at every whole frame of the range");
     dump->add_option("--sample-fps", options.sampleFps, "Sample at this many frames per second")
-        ->check(refuseUnlessFinite);
+        ->check(refuseUnlessFinite)
+        ->check(CLI::PositiveNumber);
     dump->add_flag_callback(
         "--no-transform-points", [&options] { options.transformPoints = false; },
         "Leave mesh points in the node's space, those of skins in the world");
@@ -125,7 +107,7 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
             },
             "Comma list of cameras, lights, nulls, transforms, meshes (default: all)")
         ->type_name("LIST");
-    addFrames(*convert, options.frames, "Points of meshes at every whole frame of A:B, as point caches");
+    tool::addFrames(*convert, options.frames, "Points of meshes at every whole frame of A:B, as point caches");
     convert->add_option("--fps", options.fps, "Sample and write at this many frames per second")
         ->check(refuseUnlessFinite)
         ->check(CLI::PositiveNumber);
@@ -136,39 +118,95 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
         ->type_name("FORM");
     convert->add_flag("--local", options.local, "Local transforms instead of global ones");
     convert->add_flag("--force", options.force, "Overwrite what is there already");
+    convert->add_flag("--strict", options.strict, "Exit with status 3 when not everything came over");
+}
+
+constexpr const char* kStatuses =
+    "Exit status: 0 all is well; 1 something could not be read or written; 2 wrong usage;\n"
+    "3 done, but with --strict: not everything came over.";
+
+/// What the first word is, when it is no option; a command that there is not gets an answer of its own.
+std::string unknownCommand(const CLI::App& app, const std::string& word) {
+    std::vector<std::string> names{"help"};
+    for (const CLI::App* command : app.get_subcommands([](const CLI::App*) { return true; }))
+        names.push_back(command->get_name());
+    if (word.empty() || word.front() == '-' || std::find(names.begin(), names.end(), word) != names.end())
+        return {};
+    std::string answer = "there is no command \"" + word + '"';
+    const std::vector<std::string> similar = tool::mostSimilar(word, names);
+    for (std::size_t i = 0; i < similar.size(); ++i)
+        answer += (i == 0 ? "; did you mean " : " or ") + similar[i];
+    return answer + (similar.empty() ? "; tarnell-fbx help lists them" : "?");
+}
+
+/// Prints the help of the tool, or of the command that the second word names.
+int help(CLI::App& app, const std::string& command) {
+    if (command.empty()) {
+        std::cout << app.help();
+        return tool::kSuccess;
+    }
+    const std::string unknown = unknownCommand(app, command);
+    if (!unknown.empty()) {
+        std::cerr << "tarnell-fbx: " << tool::terminalText(unknown) << '\n';
+        return tool::kWrongUsage;
+    }
+    std::cout << (command == "help" ? app.help() : app.get_subcommand(command)->help());
+    return tool::kSuccess;
 }
 
 int run(int argc, char** argv) {
-    std::ios::sync_with_stdio(false);
     CLI::App app("Looks into FBX files and writes them", "tarnell-fbx");
     app.require_subcommand(1);
+    app.footer(kStatuses);
+    app.set_version_flag("--version", std::string("tarnell-fbx ") + TARNELL_FBX_VERSION);
+    std::function<int()> chosen;
+    tool::addLookCommands(app, chosen);
     tool::DumpOptions dumpOptions;
     addDump(app, dumpOptions);
     tool::ConvertOptions convertOptions;
     addConvert(app, convertOptions);
-    std::vector<std::string> infoFiles;
-    CLI::App* info = app.add_subcommand("info", "Show on one screen what a file holds");
-    info->add_option("FILE", infoFiles, "FBX files")->required();
 
+    const std::vector<std::string> words(argv + 1, argv + argc);
+    if (!words.empty() && words[0] == "help")
+        return help(app, words.size() > 1 ? words[1] : "");
+    const std::string unknown = words.empty() ? "" : unknownCommand(app, words[0]);
+    if (!unknown.empty()) {
+        std::cerr << "tarnell-fbx: " << tool::terminalText(unknown) << '\n';
+        return tool::kWrongUsage;
+    }
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& error) {
-        const bool asked = error.get_exit_code() == 0; // --help
+        const bool asked = error.get_exit_code() == 0; // --help, --version
         app.exit(error, std::cout, std::cerr);
         return asked ? tool::kSuccess : tool::kWrongUsage;
     }
-    if (*info)
-        return tool::info(infoFiles);
+    if (chosen)
+        return chosen();
     if (app.got_subcommand("convert"))
         return tool::guarded(convertOptions.input, [&] { return tool::convert(convertOptions); });
     return tool::guarded(dumpOptions.file, [&] { return tool::dump(dumpOptions); });
+}
+
+/// Runs, and sees to it that all of what was printed arrives.
+int runToTheEnd(int argc, char** argv) {
+    tool::CheckedOutput output(std::cout, STDOUT_FILENO);
+    try {
+        const int status = run(argc, argv);
+        output.finish();
+        return status;
+    } catch (const tool::OutputFailure& failure) {
+        if (!failure.readerLeft())
+            tool::printError("standard output", std::generic_category().message(failure.systemError()));
+        return tool::kUnreadable;
+    }
 }
 
 } // namespace
 
 int main(int argc, char** argv) {
     try {
-        return run(argc, argv);
+        return runToTheEnd(argc, argv);
     } catch (const std::exception& error) { // before a command had a file
         std::fprintf(stderr, "tarnell-fbx: %s\n", error.what());
         return tool::kUnreadable;

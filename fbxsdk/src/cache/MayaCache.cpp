@@ -18,12 +18,6 @@ namespace {
 
 namespace fs = std::filesystem;
 
-/// The path of the description without its extension: data files are named after it.
-std::string baseOf(const std::string& descriptionFile) {
-    fs::path path(descriptionFile);
-    return path.replace_extension().string();
-}
-
 constexpr std::string_view kFloatVectors = "FloatVectorArray";
 
 /// The number at the front of the text, which is cut off. False when there is none.
@@ -64,15 +58,37 @@ bool frameFileTicks(std::string_view name, std::string_view base, std::int64_t t
 
 } // namespace
 
+std::string mayaCacheBase(const std::string& descriptionFile) {
+    fs::path path(descriptionFile);
+    return path.replace_extension().string();
+}
+
+std::map<std::int32_t, std::string> mayaFrameFiles(const std::string& base, const MayaCacheDescription& description) {
+    std::map<std::int32_t, std::string> files;
+    const fs::path basePath(base);
+    std::error_code error;
+    for (fs::directory_iterator entry(basePath.parent_path().empty() ? "." : basePath.parent_path(), error), end;
+         !error && entry != end; entry.increment(error)) {
+        const fs::path& file = entry->path();
+        std::int32_t ticks = 0;
+        if (file.extension() != description.dataExtension())
+            continue;
+        if (frameFileTicks(file.stem().string(), basePath.filename().string(), description.ticksPerFrame, ticks))
+            files.try_emplace(ticks, file.string());
+    }
+    return files;
+}
+
 std::unique_ptr<MayaCacheReader> MayaCacheReader::open(const std::string& descriptionFile, FbxStatus& status) {
     auto reader = std::make_unique<MayaCacheReader>();
     if (!readMayaCacheDescription(descriptionFile, reader->mDescription, status))
         return nullptr;
-    const std::string base = baseOf(descriptionFile);
+    const std::string base = mayaCacheBase(descriptionFile);
     if (reader->mDescription.oneFile) {
         reader->openOneFile(base, status);
     } else {
-        reader->listFrameFiles(base);
+        for (auto& [ticks, file] : mayaFrameFiles(base, reader->mDescription))
+            reader->mSamples.try_emplace(ticks, Sample{std::move(file), {}});
     }
     if (!reader->mSamples.empty())
         return reader;
@@ -96,22 +112,6 @@ void MayaCacheReader::openOneFile(const std::string& base, FbxStatus& status) {
     for (MayaCacheFrame& frame : data.frames) {
         const std::int32_t ticks = frame.hasTime ? frame.ticks : mDescription.start;
         mSamples.try_emplace(ticks, Sample{{}, std::move(frame)}); // of equal times the first counts
-    }
-}
-
-void MayaCacheReader::listFrameFiles(const std::string& base) {
-    const fs::path basePath(base);
-    std::error_code error;
-    for (fs::directory_iterator entry(basePath.parent_path().empty() ? "." : basePath.parent_path(), error), end;
-         !error && entry != end; entry.increment(error)) {
-        const fs::path& file = entry->path();
-        std::int32_t ticks = 0;
-        if (file.extension() != mDescription.dataExtension())
-            continue;
-        if (!frameFileTicks(file.stem().string(), basePath.filename().string(), mDescription.ticksPerFrame, ticks)) {
-            continue;
-        }
-        mSamples.try_emplace(ticks, Sample{file.string(), {}});
     }
 }
 
@@ -182,7 +182,7 @@ bool MayaCacheReader::sampleRange(std::int32_t& first, std::int32_t& last) const
 
 MayaCacheWriter::MayaCacheWriter(const std::string& descriptionFile, const MayaCacheDescription& description,
                                  FileOperations& operations)
-    : mDataFile(baseOf(descriptionFile) + description.dataExtension()), mDescription(description),
+    : mDataFile(mayaCacheBase(descriptionFile) + description.dataExtension()), mDescription(description),
       mData(mDataFile, operations), mText(descriptionFile, operations) {}
 
 std::unique_ptr<MayaCacheWriter> MayaCacheWriter::open(const std::string& descriptionFile,

@@ -18,6 +18,12 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+/// The path of a cache without the extension of its description: data files are named after it.
+[[nodiscard]] std::string mayaCacheBase(const std::string& descriptionFile);
+/// The data files of a cache with a file per sample, by tick.
+[[nodiscard]] std::map<std::int32_t, std::string> mayaFrameFiles(const std::string& base,
+                                                                 const MayaCacheDescription& description);
+
 /// Samples by time over one data file or over one file per sample.
 class MayaCacheReader {
 public:
@@ -37,7 +43,6 @@ private:
     };
 
     void openOneFile(const std::string& base, FbxStatus& status);
-    void listFrameFiles(const std::string& base);
     bool readSample(const Sample& sample, const std::string& channel, std::span<double> points, FbxStatus& status);
 
     MayaCacheDescription mDescription;

@@ -10,6 +10,7 @@
 // of the file, of the block around the record, or of the record itself, before anything is allocated.
 #include "container/BinaryReader.h"
 
+#include <algorithm>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -113,6 +114,7 @@ private:
     bool readValues(Record& record, const Head& head, std::size_t end);
     bool readScalarList(Record& record, std::size_t count, std::size_t end);
     bool readValue(Value& value, std::size_t end);
+    bool readValueOf(char code, Value& value, std::size_t end);
     template <class Number>
     bool readScalar(Value& value, std::size_t end);
     bool readLetter(Value& value, std::size_t end);
@@ -276,6 +278,7 @@ bool BinaryReader::readScalarList(Record& record, std::size_t count, std::size_t
     array.bytes = mBytes.subspan(mOffset + 1, count * stride - 1);
     const std::span<Value> values = mTree.newValues(1);
     values[0] = Value::ofArray(array);
+    values[0].code = code->code;
     record.values = values;
     return true;
 }
@@ -285,6 +288,12 @@ bool BinaryReader::readValue(Value& value, std::size_t end) {
         return fail(mOffset, "the record has fewer values than it says");
     }
     const char code = mBytes[mOffset++];
+    const bool read = readValueOf(code, value, end);
+    value.code = code;
+    return read;
+}
+
+bool BinaryReader::readValueOf(char code, Value& value, std::size_t end) {
     switch (code) {
     case 'C':
     case 'B':
@@ -398,6 +407,17 @@ bool BinaryReader::checkArray(const StoredArray& array, std::size_t offset) {
 } // namespace
 
 bool isBinary(std::span<const char> bytes) { return std::string_view(bytes.data(), bytes.size()).starts_with(kMagic); }
+
+std::uint64_t binaryRecordEnd(std::span<const char> bytes, const RecordTree& tree, const Record& record) {
+    const bool swap = needsSwap(tree.bigEndian), wide = tree.version >= kFirstWideVersion;
+    const std::size_t fieldSize = wide ? 8 : 4;
+    const auto field = [&](std::size_t index) {
+        const char* const place = bytes.data() + record.location + index * fieldSize;
+        return wide ? loadNumber<std::uint64_t>(place, swap) : loadNumber<std::uint32_t>(place, swap);
+    };
+    const std::uint64_t valuesEnd = record.location + 3 * fieldSize + 1 + record.name.size() + field(2);
+    return std::max(field(0), valuesEnd);
+}
 
 bool readBinary(std::span<const char> bytes, RecordTree& tree, FbxStatus& status) {
     return BinaryReader(bytes, tree, status).read();

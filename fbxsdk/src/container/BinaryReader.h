@@ -4,6 +4,7 @@
 // Binary files: a 27-byte header, then records whose sizes and ends stand before them.
 #pragma once
 
+#include <cstdint>
 #include <span>
 
 #include "container/Record.h"
@@ -16,6 +17,9 @@ namespace detail {
 
 /// Cuts the bytes into the tree's records and fills in its version and byte order. False with a sentence in the status.
 [[nodiscard]] bool readBinary(std::span<const char> bytes, RecordTree& tree, FbxStatus& status);
+
+/// The offset behind a record that was cut from the bytes, and behind its block.
+[[nodiscard]] std::uint64_t binaryRecordEnd(std::span<const char> bytes, const RecordTree& tree, const Record& record);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

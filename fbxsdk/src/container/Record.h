@@ -39,6 +39,7 @@ struct StoredArray {
 struct Value {
     enum class Type : std::uint8_t { none, integer, real, text, raw, word, array };
     Type type = Type::none;
+    char code = 0; ///< letter of its type in a binary file, of its elements' type for a list; 0 in an ASCII file
     union {
         std::int64_t integer = 0;
         double real;

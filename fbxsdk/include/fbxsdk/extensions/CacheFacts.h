@@ -1,0 +1,74 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// An extension of this platform, not part of the documented API, and not included by <fbxsdk.h>: what point caches
+// hold, sample by sample, with the place of each, and what is wrong with them. FbxCache opens a cache that is sound;
+// this looks into any.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include <fbxsdk/FbxCache.h>
+#include <fbxsdk/FbxStatus.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace extensions {
+
+/// A channel as the description of a Maya cache has it. Times are frames at the rate of the cache.
+struct CacheChannelFacts {
+    std::string name, type, interpretation;
+    bool regular = true;
+    double step = 1.0; ///< frames between samples
+    double start = 0.0, end = 0.0;
+};
+
+/// The numbers of one channel in one sample.
+struct CacheBlockFacts {
+    std::string channel;
+    std::uint64_t count = 0; ///< points, or numbers of a channel that has no vectors
+    int components = 3;
+    bool doubles = true;
+    std::uint64_t offset = 0, bytes = 0; ///< of the numbers, in the sample's file
+};
+
+struct CacheSampleFacts {
+    /// At the rate of the cache; of a Max cache at that of the scene, of a data file without description at 24.
+    double frame = 0.0;
+    std::string file;
+    std::vector<CacheBlockFacts> blocks; ///< one without a name for a Max cache
+};
+
+struct CacheFaultFacts {
+    std::string file;
+    std::uint64_t offset = 0;
+    std::string reason;
+};
+
+struct CacheFacts {
+    FbxCache::EFileFormat format = FbxCache::eUnknownFileFormat;
+    std::string description; ///< the .xml file; empty where there is none
+    bool oneFile = true;     ///< else a data file per sample
+    bool wide = false;       ///< 64-bit chunks (.mcx)
+    double frameRate = 0.0;  ///< frames per second; 0: the cache does not say
+    double start = 0.0, end = 0.0;
+    double framesPerSample = 1.0;    ///< as a Max cache has it
+    std::uint64_t statedSamples = 0; ///< by a Max cache's header
+    std::uint64_t bytes = 0;         ///< of all data files
+    std::uint64_t files = 0;         ///< data files
+    std::vector<CacheChannelFacts> channels;
+    std::vector<CacheSampleFacts> samples; ///< by time
+    std::vector<CacheFaultFacts> faults;
+};
+
+/// Looks into a cache: a description, a data file, or a Max point cache; its content says which. A data file is taken
+/// for part of the cache of the description beside it, when there is one. With `verify` every number is read. False
+/// when there is no cache in the file at all; what is wrong with one that there is comes in `faults`.
+[[nodiscard]] FBXSDK_DLL bool readCacheFacts(const char* fileName, bool verify, CacheFacts& facts, FbxStatus& status);
+
+/// Where the cache's file is looked for, best place first.
+[[nodiscard]] FBXSDK_DLL std::vector<std::string> cachePlaces(const FbxCache& cache);
+
+} // namespace extensions
+FBXSDK_NAMESPACE_END

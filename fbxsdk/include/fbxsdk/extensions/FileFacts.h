@@ -1,0 +1,30 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// An extension of this platform, not part of the documented API, and not included by <fbxsdk.h>: what a file says of
+// its objects beyond what they are. Programs that are to compile against another SDK do without it.
+#pragma once
+
+#include <cstdint>
+#include <vector>
+
+#include <fbxsdk/FbxObject.h>
+#include <fbxsdk/FbxProperty.h>
+#include <fbxsdk/FbxScene.h>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace extensions {
+
+/// The number by which the file names the object in its connections; 0 when the object comes from no file. Files before
+/// 7.0 name objects by their names: numbers are made up for theirs.
+[[nodiscard]] FBXSDK_DLL std::int64_t fileIdOf(const FbxObject& object);
+
+/// Whether the property says anything of its own: the file or its templates state it, it was set, or it is connected or
+/// animated. Otherwise it stands at the default of its class. False for an invalid property.
+[[nodiscard]] FBXSDK_DLL bool isStated(const FbxProperty& property);
+
+/// All objects of the scene, in the order of their entry: what GetSrcObject hands out one by one, in one walk.
+[[nodiscard]] FBXSDK_DLL std::vector<FbxObject*> objectsOf(const FbxScene& scene);
+
+} // namespace extensions
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,106 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// An extension of this platform, not part of the documented API, and not included by <fbxsdk.h>: a file as the records
+// that it is made of, whatever they mean. For those who write readers and writers of the format, and look for what a
+// program has put where.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <string_view>
+
+#include <fbxsdk/FbxArch.h>
+#include <fbxsdk/FbxStatus.h>
+
+FBXSDK_NAMESPACE_BEGIN
+
+namespace detail {
+struct Record;
+class RecordTree;
+} // namespace detail
+
+namespace extensions {
+
+/// One value of a record.
+struct RecordValue {
+    enum EType {
+        eInteger,
+        eReal,
+        eText,
+        eBytes,
+        eWord, ///< a bare word of an ASCII file, a single letter of a binary one
+        eList  ///< an array, or the many numbers that files before 7.0 list one by one
+    };
+    EType type = eInteger;
+    /// The letter of the type in a binary file: I, L, D, S …, of a list that of its elements (i, d … for an array, I, D
+    /// … for single numbers); 0 in an ASCII file.
+    char code = 0;
+    std::int64_t integer = 0;
+    double real = 0.0;
+    std::string_view text; ///< of texts, bytes and words, as the file has them
+
+    // Of lists.
+    std::uint64_t count = 0;       ///< numbers
+    std::uint64_t storedBytes = 0; ///< that they take in the file
+    enum EElement { eInt8, eInt32, eInt64, eFloat32, eFloat64, eWritten };
+    EElement element = eFloat64; ///< eWritten: as digits, in an ASCII file
+    bool compressed = false;
+};
+
+/// A handle to one record; valid as long as its file. An empty one stands for "there is none".
+class FBXSDK_DLL FileRecord {
+public:
+    FileRecord() = default;
+    explicit FileRecord(const detail::Record* record) : mRecord(record) {}
+
+    explicit operator bool() const { return mRecord != nullptr; }
+    [[nodiscard]] std::string_view name() const;
+    /// The offset of its first byte in a binary file, the number of its line in an ASCII one.
+    [[nodiscard]] std::uint64_t location() const;
+    /// Whether a block follows its values, which may be empty.
+    [[nodiscard]] bool hasBlock() const;
+    [[nodiscard]] FileRecord firstChild() const;
+    [[nodiscard]] FileRecord nextSibling() const;
+
+    [[nodiscard]] std::size_t valueCount() const;
+    /// An integer 0 for an index out of range.
+    [[nodiscard]] RecordValue value(std::size_t index) const;
+    /// The first numbers of the record's list. False, and zeros, when there are fewer or the array is damaged.
+    [[nodiscard]] bool readNumbers(double* destination, std::size_t count) const;
+    [[nodiscard]] bool readNumbers(std::int64_t* destination, std::size_t count) const;
+
+    /// The platform's own view of the record.
+    [[nodiscard]] const detail::Record& record() const { return *mRecord; }
+
+private:
+    const detail::Record* mRecord = nullptr;
+};
+
+/// A file cut into records.
+class FBXSDK_DLL RecordFile {
+public:
+    /// Null when the file cannot be read; the status then says which file, where in it, and what is wrong.
+    [[nodiscard]] static std::unique_ptr<RecordFile> open(const char* fileName, FbxStatus& status);
+    ~RecordFile();
+    RecordFile(const RecordFile&) = delete;
+    RecordFile& operator=(const RecordFile&) = delete;
+
+    /// As the head of the file says; 0 when an ASCII file says nothing.
+    [[nodiscard]] std::uint32_t version() const;
+    [[nodiscard]] bool isAscii() const;
+    [[nodiscard]] bool isBigEndian() const;
+    [[nodiscard]] std::uint64_t size() const;
+    /// The first record of the top level.
+    [[nodiscard]] FileRecord first() const;
+    /// The offset behind the record and its block in a binary file; 0 in an ASCII one.
+    [[nodiscard]] std::uint64_t endOf(const FileRecord& record) const;
+
+private:
+    explicit RecordFile(std::unique_ptr<detail::RecordTree> tree);
+    std::unique_ptr<detail::RecordTree> mTree;
+};
+
+} // namespace extensions
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,305 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What point caches hold, also those that cannot be used: nothing here gives up at the first fault.
+#include <fbxsdk/extensions/CacheFacts.h>
+
+#include <algorithm>
+#include <cmath>
+#include <cstdio>
+#include <filesystem>
+#include <map>
+#include <optional>
+#include <system_error>
+
+#include <fbxsdk/FbxScene.h>
+
+#include "cache/CacheSearch.h"
+#include "cache/MayaCache.h"
+#include "container/ByteOrder.h"
+#include "container/MappedFile.h"
+#include "scene/SceneData.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace extensions {
+namespace {
+
+using detail::MappedFile;
+
+constexpr std::string_view kMaxMagic("POINTCACHE2\0", 12);
+constexpr std::size_t kMaxHeaderBytes = 32;
+
+/// The first number that is none, as the offset of its bytes.
+template <class Number>
+std::optional<std::size_t> firstNotFinite(std::span<const char> bytes, bool swap) {
+    for (std::size_t at = 0; at + sizeof(Number) <= bytes.size(); at += sizeof(Number)) {
+        if (!std::isfinite(detail::loadNumber<Number>(bytes.data() + at, swap)))
+            return at;
+    }
+    return {};
+}
+
+std::string pointsOf(std::uint64_t count) { return std::to_string(count) + (count == 1 ? " point" : " points"); }
+
+// ---- Maya ----
+
+class MayaInspection {
+public:
+    MayaInspection(CacheFacts& facts, bool verify) : mFacts(facts), mVerify(verify) {}
+
+    bool readDescribed(const std::string& descriptionFile, FbxStatus& status) {
+        if (!detail::readMayaCacheDescription(descriptionFile, mDescription, status))
+            return false;
+        mFacts.description = descriptionFile;
+        mFacts.oneFile = mDescription.oneFile;
+        mFacts.wide = mDescription.wide;
+        takeChannels();
+        const std::string base = detail::mayaCacheBase(descriptionFile);
+        if (mDescription.oneFile) {
+            readFile(base + mDescription.dataExtension(), {});
+        } else {
+            for (const auto& [ticks, file] : detail::mayaFrameFiles(base, mDescription))
+                readFile(file, ticks);
+        }
+        finish();
+        for (const detail::MayaCacheChannel& channel : mDescription.channels)
+            checkTimes(channel);
+        return true;
+    }
+
+    /// A data file without description, which would state the frame rate.
+    void readAlone(const std::string& dataFile, bool wide) {
+        mFacts.wide = wide;
+        readFile(dataFile, {});
+        finish();
+        if (!mFacts.samples.empty()) {
+            mFacts.start = mFacts.samples.front().frame;
+            mFacts.end = mFacts.samples.back().frame;
+        }
+    }
+
+private:
+    [[nodiscard]] double frameOf(double ticks) const { return ticks / mDescription.ticksPerFrame; }
+
+    void fault(const std::string& file, std::uint64_t offset, const std::string& reason) {
+        mFacts.faults.push_back({file, offset, reason});
+    }
+
+    void takeChannels() {
+        mFacts.frameRate = static_cast<double>(detail::kMayaTicksPerSecond) / mDescription.ticksPerFrame;
+        mFacts.start = frameOf(mDescription.start);
+        mFacts.end = frameOf(mDescription.end);
+        for (const detail::MayaCacheChannel& channel : mDescription.channels) {
+            mFacts.channels.push_back({channel.name, channel.type, channel.interpretation, channel.regular,
+                                       frameOf(channel.samplingRate), frameOf(channel.start), frameOf(channel.end)});
+        }
+    }
+
+    void readFile(const std::string& name, std::optional<std::int32_t> ticks) {
+        FbxStatus status;
+        const auto file = MappedFile::open(name, status);
+        if (!file) {
+            fault(name, 0, status.GetErrorString());
+            return;
+        }
+        ++mFacts.files;
+        mFacts.bytes += file->bytes().size();
+        const detail::MayaCacheData data = detail::parseMayaCacheData(file->bytes());
+        if (data.end < file->bytes().size())
+            fault(name, data.end, "cut off or damaged");
+        if (data.frames.empty())
+            fault(name, 0, "no sample in it");
+        for (const detail::MayaCacheFrame& frame : data.frames) {
+            const std::int32_t stated = frame.hasTime ? frame.ticks : mDescription.start;
+            addSample(name, file->bytes(), frame, ticks.value_or(stated));
+            if (ticks) // readers take the first sample of such a file
+                break;
+        }
+    }
+
+    void addSample(const std::string& file, std::span<const char> bytes, const detail::MayaCacheFrame& frame,
+                   std::int32_t ticks) {
+        CacheSampleFacts sample{frameOf(ticks), file, {}};
+        for (const detail::MayaCacheBlock& block : frame.blocks) {
+            const auto offset = static_cast<std::uint64_t>(block.bytes.data() - bytes.data());
+            sample.blocks.push_back({std::string(block.channel), block.elementCount, block.componentCount,
+                                     block.doubles, offset, block.bytes.size()});
+            if (mVerify)
+                checkNumbers(file, offset, block);
+        }
+        mFacts.samples.push_back(std::move(sample));
+    }
+
+    void checkNumbers(const std::string& file, std::uint64_t offset, const detail::MayaCacheBlock& block) {
+        constexpr bool kSwap = detail::needsSwap(/*bigEndian=*/true);
+        const auto bad =
+            block.doubles ? firstNotFinite<double>(block.bytes, kSwap) : firstNotFinite<float>(block.bytes, kSwap);
+        if (bad)
+            fault(file, offset + *bad, "channel " + std::string(block.channel) + ": a number that is not finite");
+    }
+
+    void finish() {
+        auto& samples = mFacts.samples;
+        std::stable_sort(samples.begin(), samples.end(),
+                         [](const CacheSampleFacts& a, const CacheSampleFacts& b) { return a.frame < b.frame; });
+        checkCounts();
+    }
+
+    /// All samples of a channel have as many points as its first.
+    void checkCounts() {
+        std::map<std::string, std::uint64_t> counts;
+        for (const CacheSampleFacts& sample : mFacts.samples) {
+            for (const CacheBlockFacts& block : sample.blocks) {
+                const auto [known, isFirst] = counts.try_emplace(block.channel, block.count);
+                if (!isFirst && known->second != block.count)
+                    fault(sample.file, block.offset,
+                          "channel " + block.channel + ": " + pointsOf(block.count) + ", its first sample has " +
+                              std::to_string(known->second));
+            }
+        }
+    }
+
+    /// Every time that the description promises has a sample of the channel.
+    void checkTimes(const detail::MayaCacheChannel& channel) {
+        std::vector<double> frames;
+        for (const CacheSampleFacts& sample : mFacts.samples) {
+            const bool has = std::any_of(sample.blocks.begin(), sample.blocks.end(),
+                                         [&](const CacheBlockFacts& block) { return block.channel == channel.name; });
+            if (has)
+                frames.push_back(sample.frame);
+        }
+        if (frames.empty()) {
+            fault(mFacts.description, 0, "channel " + channel.name + ": no sample of it");
+            return;
+        }
+        if (!channel.regular || channel.samplingRate < 1)
+            return;
+        constexpr std::size_t kMostMissing = 100;
+        std::size_t missing = 0;
+        const double close = frameOf(1) / 2;
+        for (std::int64_t ticks = channel.start; ticks <= channel.end && missing < kMostMissing;
+             ticks += channel.samplingRate) {
+            const double frame = frameOf(static_cast<double>(ticks));
+            const auto near = std::lower_bound(frames.begin(), frames.end(), frame - close);
+            if (near != frames.end() && *near <= frame + close)
+                continue;
+            ++missing;
+            char text[32];
+            std::snprintf(text, sizeof text, "%.6g", frame);
+            fault(mFacts.description, 0,
+                  "channel " + channel.name + ": no sample at frame " + text +
+                      (missing == kMostMissing ? "; further ones are not listed" : ""));
+        }
+    }
+
+    CacheFacts& mFacts;
+    bool mVerify;
+    detail::MayaCacheDescription mDescription;
+};
+
+// ---- Max ----
+
+void readMaxFacts(const std::string& name, std::span<const char> bytes, bool verify, CacheFacts& facts) {
+    constexpr bool kSwap = detail::needsSwap(/*bigEndian=*/false);
+    facts.format = FbxCache::eMaxPointCacheV2;
+    facts.files = 1;
+    facts.bytes = bytes.size();
+    const auto fault = [&](std::uint64_t offset, const std::string& reason) {
+        facts.faults.push_back({name, offset, reason});
+    };
+    if (bytes.size() < kMaxHeaderBytes) {
+        fault(bytes.size(), "the file ends within its header of 32 bytes");
+        return;
+    }
+    const auto points = detail::loadNumber<std::int32_t>(bytes.data() + 16, kSwap);
+    const auto start = static_cast<double>(detail::loadNumber<float>(bytes.data() + 20, kSwap));
+    const auto samples = detail::loadNumber<std::int32_t>(bytes.data() + 28, kSwap);
+    facts.framesPerSample = static_cast<double>(detail::loadNumber<float>(bytes.data() + 24, kSwap));
+    facts.statedSamples = samples > 0 ? static_cast<std::uint64_t>(samples) : 0;
+    if (points < 1)
+        fault(16, "a cache of " + std::to_string(points) + " points");
+    if (samples < 1)
+        fault(28, "a cache of " + std::to_string(samples) + " samples");
+    if (!std::isfinite(start))
+        fault(20, "a start frame that is not finite");
+    // Above one, some writers mean the frames per second.
+    const bool isStep = facts.framesPerSample > 0.0 && facts.framesPerSample <= 1.0;
+    const double step = isStep ? facts.framesPerSample : 1.0;
+    if (!isStep)
+        fault(24, "frames per sample are to be above 0 and at most 1; readers take one frame per sample");
+    facts.start = std::isfinite(start) ? start : 0.0;
+    facts.end = facts.start + static_cast<double>(facts.statedSamples > 0 ? facts.statedSamples - 1 : 0) * step;
+    if (points < 1)
+        return;
+
+    const std::uint64_t sampleBytes = static_cast<std::uint64_t>(points) * 12;
+    const std::uint64_t complete = std::min(facts.statedSamples, (bytes.size() - kMaxHeaderBytes) / sampleBytes);
+    for (std::uint64_t i = 0; i < complete; ++i) {
+        const std::uint64_t offset = kMaxHeaderBytes + i * sampleBytes;
+        facts.samples.push_back(
+            {facts.start + static_cast<double>(i) * step,
+             name,
+             {{"", static_cast<std::uint64_t>(points), 3, /*doubles=*/false, offset, sampleBytes}}});
+        const auto bad = verify ? firstNotFinite<float>(bytes.subspan(offset, sampleBytes), kSwap) : std::nullopt;
+        if (bad)
+            fault(offset + *bad, "a number that is not finite");
+    }
+    if (complete < facts.statedSamples) {
+        fault(kMaxHeaderBytes + complete * sampleBytes, "cut off: " + std::to_string(facts.statedSamples - complete) +
+                                                            " of " + std::to_string(facts.statedSamples) +
+                                                            " samples are missing");
+    } else if (kMaxHeaderBytes + complete * sampleBytes < bytes.size()) {
+        fault(kMaxHeaderBytes + complete * sampleBytes,
+              std::to_string(bytes.size() - kMaxHeaderBytes - complete * sampleBytes) +
+                  " bytes behind the last sample");
+    }
+}
+
+// ---- Which it is ----
+
+/// The description that a data file belongs to: that of its own name, or without "Frame12" at the end.
+std::string descriptionOf(const std::string& dataFile) {
+    std::string base = detail::mayaCacheBase(dataFile);
+    std::error_code ignored;
+    if (std::filesystem::exists(base + ".xml", ignored))
+        return base + ".xml";
+    const std::size_t frame = base.rfind("Frame");
+    if (frame == std::string::npos)
+        return {};
+    base.resize(frame);
+    return std::filesystem::exists(base + ".xml", ignored) ? base + ".xml" : std::string();
+}
+
+} // namespace
+
+bool readCacheFacts(const char* fileName, bool verify, CacheFacts& facts, FbxStatus& status) {
+    facts = {};
+    const std::string name = fileName ? fileName : "";
+    const auto file = MappedFile::open(name, status);
+    if (!file)
+        return false;
+    const std::string_view text(file->bytes().data(), file->bytes().size());
+    if (text.starts_with(kMaxMagic)) {
+        readMaxFacts(name, file->bytes(), verify, facts);
+        return true;
+    }
+    facts.format = FbxCache::eMayaCache;
+    MayaInspection inspection(facts, verify);
+    const bool isData = text.starts_with("FOR4") || text.starts_with("FOR8");
+    const std::string description = isData ? descriptionOf(name) : name;
+    if (!description.empty())
+        return inspection.readDescribed(description, status);
+    inspection.readAlone(name, text.starts_with("FOR8"));
+    return true;
+}
+
+std::vector<std::string> cachePlaces(const FbxCache& cache) {
+    FbxString relative, absolute;
+    cache.GetCacheFileName(relative, absolute);
+    const FbxScene* scene = cache.GetScene();
+    return detail::cacheFileCandidates(scene ? scene->sceneData().fileName() : std::string(), relative.Buffer(),
+                                       absolute.Buffer());
+}
+
+} // namespace extensions
+FBXSDK_NAMESPACE_END

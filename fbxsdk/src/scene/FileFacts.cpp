@@ -1,0 +1,29 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What files say of objects beyond what they are.
+#include <fbxsdk/extensions/FileFacts.h>
+
+#include "scene/ObjectData.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace extensions {
+
+std::int64_t fileIdOf(const FbxObject& object) { return object.data().fileId; }
+
+bool isStated(const FbxProperty& property) {
+    return property.IsValid() && property.index() >= 0 &&
+           property.GetFbxObject()->data().property(property.index()) != nullptr;
+}
+
+std::vector<FbxObject*> objectsOf(const FbxScene& scene) {
+    std::vector<FbxObject*> objects;
+    for (const detail::ConnectionPoint* point : scene.data().plug.sources) {
+        if (point->property < 0)
+            objects.push_back(point->object);
+    }
+    return objects;
+}
+
+} // namespace extensions
+FBXSDK_NAMESPACE_END

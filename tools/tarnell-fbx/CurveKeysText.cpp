@@ -1,0 +1,160 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Keys in words. A key holds its right slope and the left slope of the next key, so that what stands left of a key is
+// asked of the one before it.
+#include "CurveKeysText.h"
+
+#include "SceneFacts.h"
+
+namespace tool {
+namespace {
+
+using Def = FbxAnimCurveDef;
+
+const char* interpolationName(const FbxAnimCurve& curve, int key) {
+    switch (curve.KeyGetInterpolation(key)) {
+    case Def::eInterpolationConstant:
+        return curve.KeyGetConstantMode(key) == Def::eConstantNext ? "next" : "constant";
+    case Def::eInterpolationLinear:
+        return "linear";
+    case Def::eInterpolationCubic:
+        return "cubic";
+    }
+    return "unknown";
+}
+
+bool has(int bits, int flag) { return (bits & flag) == flag; }
+
+const char* tangentName(int mode) {
+    if (has(mode, Def::eTangentTCB))
+        return "TCB";
+    if (has(mode, Def::eTangentAutoBreak))
+        return "auto broken";
+    if (has(mode, Def::eTangentAuto))
+        return "auto";
+    if (has(mode, Def::eTangentGenericBreak))
+        return "broken";
+    return has(mode, Def::eTangentUser) ? "user" : "none";
+}
+
+bool isCubic(const FbxAnimCurve& curve, int key) {
+    return key >= 0 && key + 1 < curve.KeyGetCount() && curve.KeyGetInterpolation(key) == Def::eInterpolationCubic;
+}
+
+bool isTcb(const FbxAnimCurve& curve, int key) { return has(curve.KeyGetTangentMode(key), Def::eTangentTCB); }
+
+void addLeft(const FbxAnimCurve& curve, int key, KeyFacts& facts) {
+    const int before = key - 1;
+    if (!isCubic(curve, before) || isTcb(curve, before))
+        return;
+    facts.leftSlope = curve.KeyGetData(before, Def::eNextLeftSlope);
+    const float weight = curve.KeyGetData(before, Def::eNextLeftWeight);
+    if (weight != Def::sDEFAULT_WEIGHT)
+        facts.leftWeight = weight;
+}
+
+void addRight(const FbxAnimCurve& curve, int key, KeyFacts& facts) {
+    if (!isCubic(curve, key) || isTcb(curve, key))
+        return;
+    facts.rightSlope = curve.KeyGetData(key, Def::eRightSlope);
+    const float weight = curve.KeyGetData(key, Def::eRightWeight);
+    if (weight != Def::sDEFAULT_WEIGHT)
+        facts.rightWeight = weight;
+}
+
+KeyFacts factsOf(const FbxAnimCurve& curve, int key) {
+    KeyFacts facts;
+    facts.time = curve.KeyGetTime(key);
+    facts.value = curve.KeyGetValue(key);
+    facts.interpolation = interpolationName(curve, key);
+    const int mode = curve.KeyGetTangentMode(key);
+    if (curve.KeyGetInterpolation(key) == Def::eInterpolationCubic) {
+        facts.tangent = tangentName(mode);
+        facts.clamped = has(mode, Def::eTangentGenericClamp);
+        facts.timeIndependent = has(mode, Def::eTangentGenericTimeIndependent);
+    }
+    addLeft(curve, key, facts);
+    addRight(curve, key, facts);
+    if (isCubic(curve, key) && isTcb(curve, key)) {
+        facts.tension = curve.KeyGetData(key, Def::eTCBTension);
+        facts.continuity = curve.KeyGetData(key, Def::eTCBContinuity);
+        facts.bias = curve.KeyGetData(key, Def::eTCBBias);
+    }
+    return facts;
+}
+
+Extrapolation extrapolation(FbxAnimCurveBase::EExtrapolationType type, unsigned long count) {
+    constexpr unsigned long kMost = 0x7FFFFFFF; // more means without end
+    const std::optional<long> times = count < kMost ? std::optional(static_cast<long>(count)) : std::nullopt;
+    switch (type) {
+    case FbxAnimCurveBase::eConstant:
+        return {"constant", {}};
+    case FbxAnimCurveBase::eRepetition:
+        return {"repetition", times};
+    case FbxAnimCurveBase::eMirrorRepetition:
+        return {"mirror", times};
+    case FbxAnimCurveBase::eKeepSlope:
+        return {"slope", {}};
+    case FbxAnimCurveBase::eRelativeRepetition:
+        return {"relative", times};
+    }
+    return {"unknown", {}};
+}
+
+} // namespace
+
+std::string KeyFacts::remarks() const {
+    std::string text;
+    const auto add = [&](const std::string& remark) { text += (text.empty() ? "" : ", ") + remark; };
+    if (clamped)
+        add("clamped");
+    if (timeIndependent)
+        add("time-independent");
+    if (leftWeight)
+        add("left weight " + exactText(*leftWeight));
+    if (rightWeight)
+        add("right weight " + exactText(*rightWeight));
+    if (tension)
+        add("tension " + exactText(*tension) + ", continuity " + exactText(*continuity) + ", bias " + exactText(*bias));
+    return text;
+}
+
+std::vector<KeyFacts> keyFacts(FbxAnimCurve& curve) {
+    std::vector<KeyFacts> facts;
+    for (int key = 0; key < curve.KeyGetCount(); ++key)
+        facts.push_back(factsOf(curve, key));
+    return facts;
+}
+
+Extrapolation extrapolationBefore(const FbxAnimCurve& curve) {
+    return extrapolation(curve.GetPreExtrapolation(), curve.GetPreExtrapolationCount());
+}
+
+Extrapolation extrapolationAfter(const FbxAnimCurve& curve) {
+    return extrapolation(curve.GetPostExtrapolation(), curve.GetPostExtrapolationCount());
+}
+
+void printShape(const KeyFacts& key, JsonWriter& json) {
+    json.text("interpolation", key.interpolation);
+    json.text("tangent", key.tangent);
+    json.boolean("clamped", key.clamped);
+    json.boolean("timeIndependent", key.timeIndependent);
+    const auto add = [&](const char* name, const std::optional<float>& number) {
+        json.key(name);
+        if (number) {
+            json.real(*number);
+        } else {
+            json.null();
+        }
+    };
+    add("leftSlope", key.leftSlope);
+    add("rightSlope", key.rightSlope);
+    add("leftWeight", key.leftWeight);
+    add("rightWeight", key.rightWeight);
+    add("tension", key.tension);
+    add("continuity", key.continuity);
+    add("bias", key.bias);
+}
+
+} // namespace tool

@@ -1,0 +1,38 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The curves that drive a property in one take.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include <fbxsdk.h>
+
+namespace tool {
+
+struct LayerCurve {
+    FbxAnimLayer* layer;
+    FbxAnimCurve* curve;
+};
+
+/// One number of a property, and what drives it.
+struct Channel {
+    FbxProperty property;
+    int component = 0;              ///< of the property's value
+    std::string name;               ///< "X"; empty where the property is one number
+    std::vector<LayerCurve> curves; ///< with keys, from the base layer up
+
+    /// "Lcl Translation.X"
+    [[nodiscard]] std::string fullName() const;
+    [[nodiscard]] double valueAt(FbxTime time);
+    [[nodiscard]] double staticValue() const;
+};
+
+/// A property's channels, also those that nothing drives. Without a take nothing does.
+std::vector<Channel> channelsOf(const FbxProperty& property, FbxAnimStack* take);
+
+/// How many keys all curves of the property have in the take.
+int keyCount(const FbxProperty& property, FbxAnimStack* take);
+
+} // namespace tool

@@ -1,0 +1,21 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The files that a command line means.
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace tool {
+
+struct FileList {
+    std::vector<std::string> files;
+    std::vector<std::string> unmatched; ///< patterns that stand for no file
+};
+
+/// Patterns ("shots/*.fbx") are replaced by the files that they stand for, in the order of their names; a name that is
+/// a file, and one without *, ? and [, stays as it is.
+FileList expandFiles(const std::vector<std::string>& names);
+
+} // namespace tool

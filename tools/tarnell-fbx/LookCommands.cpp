@@ -1,0 +1,168 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Options that several commands share, and those of each command that looks into files.
+#include "LookCommands.h"
+
+#include <charconv>
+#include <memory>
+#include <string_view>
+#include <system_error>
+
+#include "Commands.h"
+
+namespace tool {
+namespace {
+
+std::optional<int> wholeNumber(std::string_view text) {
+    int number = 0;
+    const char* const end = text.data() + text.size();
+    const auto [rest, error] = std::from_chars(text.data(), end, number);
+    return rest == end && error == std::errc() ? std::optional(number) : std::nullopt;
+}
+
+std::string parseFrames(const std::string& text, std::optional<std::pair<int, int>>& frames) {
+    const std::size_t colon = text.find(':');
+    const std::optional<int> first = wholeNumber(text.substr(0, colon));
+    const std::optional<int> last = colon == std::string::npos ? first : wholeNumber(text.substr(colon + 1));
+    if (!first || !last)
+        return "not a range of frames: " + text;
+    if (*first > *last)
+        return "the range " + text + " ends before it starts";
+    frames = {*first, *last};
+    return {};
+}
+
+/// A whole number from `least` on; the command line's own conversion would take other things as well.
+void addCount(CLI::App& command, const char* name, int& count, int least, const char* help) {
+    command
+        .add_option_function<std::string>(
+            name,
+            [name, &count, least](const std::string& text) {
+                const std::optional<int> number = wholeNumber(text);
+                if (!number || *number < least)
+                    throw CLI::ValidationError(name, "not a number from " + std::to_string(least) + " on: " + text);
+                count = *number;
+            },
+            help)
+        ->type_name("N");
+}
+
+void addForm(CLI::App& command, LookOptions& options, const char* name, Form form, const char* help) {
+    command.add_flag_callback(
+        name,
+        [name, form, &options] {
+            if (options.form != Form::text)
+                throw CLI::ValidationError(name, "only one form can be printed at a time");
+            options.form = form;
+        },
+        help);
+}
+
+void addJson(CLI::App& command, LookOptions& options) {
+    addForm(command, options, "--json", Form::json, "Print JSON: an object, or an array of one per file");
+    addForm(command, options, "--jsonl", Form::jsonLines, "Print JSON, one line per file");
+}
+
+void addFiles(CLI::App& command, LookOptions& options, const char* help) {
+    command.add_option("FILE", options.files, help)->required()->type_name("");
+    addJson(command, options);
+    addCount(command, "--jobs", options.jobs, 1, "Read so many files at the same time");
+}
+
+void addTake(CLI::App& command, std::string& take) {
+    command.add_option("--take", take, "The take (animation stack) of that name instead of the first")
+        ->type_name("NAME");
+}
+
+/// A command whose options live as long as it can be run.
+template <class Options>
+std::pair<CLI::App*, Options*> addCommand(CLI::App& app, std::function<int()>& chosen, const char* name,
+                                          const char* help, int (*work)(const Options&)) {
+    CLI::App* command = app.add_subcommand(name, help);
+    auto options = std::make_shared<Options>();
+    command->callback([options, &chosen, work] { chosen = [options, work] { return work(*options); }; });
+    return {command, options.get()};
+}
+
+void addTree(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<TreeOptions>(app, chosen, "tree",
+                                                      "Show the nodes as they hang below each "
+                                                      "other",
+                                                      tree);
+    addFiles(*command, *options, "FBX files, or patterns of names");
+    addCount(*command, "--depth", options->depth, 1, "Only so many levels");
+}
+
+void addProps(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<PropsOptions>(app, chosen, "props", "Show the properties of an object", props);
+    options->files.resize(1);
+    command->add_option("FILE", options->files.front(), "The FBX file")->required()->type_name("");
+    command->add_option("OBJECT", options->object, "Name of a node, or of any other object")->required()->type_name("");
+    command->add_flag("--all", options->all, "Also those that the file leaves at the defaults of their class");
+    addTake(*command, options->take);
+    addJson(*command, *options);
+}
+
+void addCurve(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<CurveOptions>(
+        app, chosen, "curve", "Show the keys of an object's animated properties, and samples of them", curve);
+    options->files.resize(1);
+    command->add_option("FILE", options->files.front(), "The FBX file")->required()->type_name("");
+    command
+        ->add_option("NODE", options->target,
+                     "NODE, NODE.PROPERTY or NODE.PROPERTY.X; a node answers for its camera or light, too")
+        ->required()
+        ->type_name("");
+    addFrames(*command, options->frames, "Samples at every whole frame of A:B");
+    addTake(*command, options->take);
+    addJson(*command, *options);
+    addForm(*command, *options, "--csv", Form::csv, "Print samples as comma-separated values, a line per frame");
+    addForm(*command, *options, "--plot", Form::plot, "Draw the curves");
+}
+
+void addCache(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<CacheOptions>(
+        app, chosen, "cache", "Show what point caches hold: those of an FBX file, or cache files themselves", cache);
+    addFiles(*command, *options, "FBX, .xml, .mc, .mcx and .pc2 files, or patterns of names");
+    command->add_flag("--verify", options->verify, "Read every number; a fault makes the exit status 1");
+    command->add_flag("--samples", options->samples, "Every sample with its place");
+}
+
+void addRecords(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<RecordsOptions>(
+        app, chosen, "records", "Show the records that a file is made of, with the place of each", records);
+    addFiles(*command, *options, "FBX files, or patterns of names");
+    command->add_option("--path", options->path, "Only records under these names, from the top: Objects/Model")
+        ->type_name("PATH");
+    addCount(*command, "--depth", options->depth, 1, "Only so many levels; deeper ones are counted");
+    addCount(*command, "--values", options->values, 0, "So many values of a list (8); 0: all");
+}
+
+} // namespace
+
+void addFrames(CLI::App& command, std::optional<std::pair<int, int>>& frames, const char* help) {
+    command
+        .add_option_function<std::string>(
+            "--frames",
+            [&frames](const std::string& text) {
+                const std::string complaint = parseFrames(text, frames);
+                if (!complaint.empty())
+                    throw CLI::ValidationError("--frames", complaint);
+            },
+            help)
+        ->type_name("A:B");
+}
+
+void addLookCommands(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] =
+        addCommand<LookOptions>(app, chosen, "info", "Show on one screen what a file holds", info);
+    addFiles(*command, *options, "FBX files, or patterns of names");
+    addTree(app, chosen);
+    addProps(app, chosen);
+    addCurve(app, chosen);
+    addCache(app, chosen);
+    addRecords(app, chosen);
+}
+
+} // namespace tool

@@ -1,0 +1,18 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Curves drawn with the dots of Braille characters, two across and four down in each.
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+namespace tool {
+
+/// Lines from top to bottom, each of so many characters. The values are spread over two dots per character, the
+/// greatest at the top, the least at the bottom; all equal ones run through the middle. Neighbours are joined; what is
+/// not finite leaves a gap.
+std::vector<std::string> brailleLines(const std::vector<double>& values, std::size_t columns, std::size_t rows);
+
+} // namespace tool

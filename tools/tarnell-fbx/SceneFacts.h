@@ -1,0 +1,37 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Words for what a scene says in numbers, the same in every command.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+#include <fbxsdk.h>
+
+namespace tool {
+
+/// At most ten significant digits, none of them useless.
+std::string numberText(double value);
+/// The fewest digits that read back as the same number.
+std::string exactText(double value);
+std::string exactText(float value);
+/// "512 bytes", "24.3 KiB", "1.5 MiB".
+std::string sizeText(std::uintmax_t bytes);
+/// A name for a person: in quotes, on one line, without control characters.
+std::string inQuotes(std::string_view name);
+
+/// "metre", or the number of centimetres.
+std::string unitName(double centimetres);
+
+struct Axes {
+    std::string up, toViewer; ///< "+Y"
+    bool rightHanded;
+};
+Axes axesOf(const FbxAxisSystem& system);
+
+/// What a node is, by its attribute: "mesh", "camera", "null"; "node" when it has none.
+const char* kindOf(const FbxNode& node);
+
+} // namespace tool

@@ -1,0 +1,48 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// A file as the commands that look into it have it: the scene, before any conversion, and the facts of the file itself.
+#pragma once
+
+#include <memory>
+#include <stdexcept>
+#include <string>
+
+#include <fbxsdk.h>
+
+namespace tool {
+
+/// Why a file cannot be shown. The sentence may begin with the file's name.
+class Unreadable : public std::runtime_error {
+public:
+    using std::runtime_error::runtime_error;
+};
+
+class SceneFile {
+public:
+    /// Throws Unreadable.
+    explicit SceneFile(const std::string& file);
+
+    [[nodiscard]] FbxScene& scene() const { return *mScene; }
+    [[nodiscard]] FbxImporter& importer() const { return *mImporter; }
+    [[nodiscard]] FbxTime::EMode timeMode() const { return mScene->GetGlobalSettings().GetTimeMode(); }
+    /// Frames per second; also where the file has a rate of its own.
+    [[nodiscard]] double frameRate() const { return FbxTime::GetFrameRate(timeMode()); }
+
+    /// Whether the file names its objects by numbers, as files from 7.0 on do.
+    [[nodiscard]] bool hasIds() const { return mImporter->GetFileHeaderInfo()->mFileVersion >= 7000; }
+
+    /// Makes the stack of that name the one that is evaluated; an empty name means the first. Null when the file has
+    /// none. Throws Unreadable, with the names that there are, when there is none of that name.
+    FbxAnimStack* chooseTake(const std::string& name) const;
+
+private:
+    struct Destroyer {
+        void operator()(FbxManager* manager) const { manager->Destroy(); }
+    };
+    std::unique_ptr<FbxManager, Destroyer> mManager;
+    FbxImporter* mImporter = nullptr;
+    FbxScene* mScene = nullptr;
+};
+
+} // namespace tool

@@ -1,0 +1,46 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Finding things in a scene.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include <fbxsdk.h>
+
+#include "JsonWriter.h"
+
+namespace tool {
+
+/// A node of the tree. Nodes that hang nowhere are at depth 0, like the children of the root.
+struct TreeNode {
+    FbxNode* node;
+    int parent; ///< index in the list; -1 at depth 0
+    int depth;
+    bool isLast;     ///< of its parent's children
+    bool isDetached; ///< hangs nowhere
+};
+
+/// All nodes but the root, parents before children, children in their order; what hangs nowhere comes last.
+std::vector<TreeNode> nodesInOrder(FbxScene& scene);
+
+/// Whether any curve of any take drives the property.
+bool isAnimated(const FbxProperty& property);
+
+/// The object's properties in their order, those of compounds behind the compound.
+std::vector<FbxProperty> propertiesOf(const FbxObject& object);
+
+/// The scene's objects of that name: nodes first, then what is no node.
+std::vector<FbxObject*> objectsNamed(FbxScene& scene, const std::string& name);
+
+/// The class without the prefix that all classes have: "Node", "Camera", "AnimLayer".
+std::string className(const FbxObject& object);
+
+/// That there is no object of the name, and what may have been meant.
+std::string unknownObject(FbxScene& scene, const std::string& name);
+
+/// The key "id": the object's number in the file, null where files name objects otherwise.
+void printId(const FbxObject& object, bool hasIds, JsonWriter& json);
+
+} // namespace tool

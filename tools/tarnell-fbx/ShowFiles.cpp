@@ -1,0 +1,185 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Files one after another, or several at the same time, each on a thread of its own; the pages come in order either
+// way.
+#include "ShowFiles.h"
+
+#include <algorithm>
+#include <condition_variable>
+#include <iostream>
+#include <mutex>
+#include <sstream>
+#include <thread>
+#include <vector>
+
+#include "FileList.h"
+#include "Progress.h"
+
+namespace tool {
+
+std::ostream& Page::begin() {
+    if (!mBegun)
+        mOut << mSeparator;
+    mBegun = true;
+    return mOut;
+}
+
+void Page::json(std::string_view command, const std::function<void(JsonWriter&)>& content) {
+    JsonWriter json(begin(), mForm == Form::json);
+    json.beginObject();
+    json.key("format");
+    json.text("tarnell-fbx " + std::string(command) + " 1");
+    json.key("file");
+    json.text(mFile);
+    content(json);
+    json.endObject();
+    if (mForm == Form::jsonLines)
+        mOut << '\n';
+}
+
+namespace {
+
+/// What several pages stand between, and what stands between two of them.
+struct Frame {
+    std::string_view before, between, after;
+};
+
+Frame frameOf(Form form, bool several) {
+    if (form == Form::json)
+        return several ? Frame{"[\n", ",\n", "\n]\n"} : Frame{"", "", "\n"};
+    return form == Form::text || form == Form::plot ? Frame{"", "\n", ""} : Frame{};
+}
+
+class Batch {
+public:
+    Batch(const LookOptions& options, std::string_view command, const Show& show)
+        : mForm(options.form), mCommand(command), mShow(show), mTerminal(standardTerminal()) {
+        const FileList list = expandFiles(options.files);
+        mFiles = list.files;
+        for (const std::string& pattern : list.unmatched) {
+            printError(pattern, "no file matches the pattern");
+            mStatus = kUnreadable;
+        }
+        mFrame = frameOf(mForm, options.files.size() > 1 || mFiles.size() != 1);
+        mWorkers = std::min(static_cast<std::size_t>(std::max(options.jobs, 1)), mFiles.size());
+    }
+
+    int run() {
+        if (mFiles.empty() && mForm != Form::json)
+            return mStatus;
+        std::cout << mFrame.before;
+        if (mWorkers > 1) {
+            runTogether();
+        } else {
+            runInTurn();
+        }
+        std::cout << mFrame.after;
+        return mStatus;
+    }
+
+private:
+    struct Result {
+        int status = kSuccess;
+        std::string text;
+        bool done = false;
+    };
+
+    int showOne(const std::string& file, std::ostream& out, std::string_view separator, bool& begun) {
+        Page page(file, mForm, mTerminal, out, separator);
+        const Outcome outcome = attempt([&] { return mShow(page); });
+        if (!outcome.reason.empty()) {
+            printError(file, outcome.reason);
+            if (page.isJson() && !page.begun()) {
+                page.json(mCommand, [&](JsonWriter& json) {
+                    json.key("error");
+                    json.text(outcome.reason);
+                });
+            }
+        }
+        begun = begun || page.begun();
+        return outcome.status;
+    }
+
+    void announce(Progress& progress, std::size_t index) const {
+        if (mFiles.size() > 1)
+            progress.say(std::to_string(index + 1) + " of " + std::to_string(mFiles.size()) + ": " + mFiles[index]);
+    }
+
+    void runInTurn() {
+        Progress progress;
+        bool begun = false;
+        for (std::size_t i = 0; i < mFiles.size(); ++i) {
+            announce(progress, i);
+            mStatus = std::max(mStatus, showOne(mFiles[i], std::cout, begun ? mFrame.between : "", begun));
+        }
+    }
+
+    void runTogether() {
+        mResults.resize(mFiles.size());
+        std::vector<std::jthread> threads;
+        for (std::size_t i = 0; i < mWorkers; ++i)
+            threads.emplace_back([this](const std::stop_token& stop) { work(stop); });
+        Progress progress;
+        bool begun = false;
+        for (std::size_t i = 0; i < mFiles.size(); ++i) {
+            announce(progress, i);
+            const Result result = takeResult(i);
+            std::cout << (begun && !result.text.empty() ? mFrame.between : "") << result.text;
+            begun = begun || !result.text.empty();
+            mStatus = std::max(mStatus, result.status);
+        }
+    }
+
+    Result takeResult(std::size_t index) {
+        std::unique_lock lock(mMutex);
+        mChanged.wait(lock, [&] { return mResults[index].done; });
+        Result result = std::move(mResults[index]);
+        mPrinted = index + 1;
+        mChanged.notify_all();
+        return result;
+    }
+
+    /// The next file, once those before it have been printed up to a few: pages that wait take memory.
+    bool takeFile(const std::stop_token& stop, std::size_t& index) {
+        std::unique_lock lock(mMutex);
+        index = mNext++;
+        return mChanged.wait(lock, stop, [&] { return index >= mFiles.size() || index < mPrinted + mWorkers * 4; }) &&
+               index < mFiles.size();
+    }
+
+    void work(const std::stop_token& stop) {
+        std::size_t index = 0;
+        while (takeFile(stop, index)) {
+            std::ostringstream out;
+            bool begun = false;
+            Result result{showOne(mFiles[index], out, "", begun), {}, true};
+            result.text = std::move(out).str();
+            const std::lock_guard lock(mMutex);
+            mResults[index] = std::move(result);
+            mChanged.notify_all();
+        }
+    }
+
+    Form mForm;
+    std::string_view mCommand;
+    const Show& mShow;
+    Terminal mTerminal;
+    std::vector<std::string> mFiles;
+    Frame mFrame;
+    int mStatus = kSuccess;
+
+    std::size_t mWorkers = 1;
+    std::mutex mMutex;
+    std::condition_variable_any mChanged;
+    std::size_t mNext = 0, mPrinted = 0;
+    std::vector<Result> mResults;
+};
+
+} // namespace
+
+int showFiles(const LookOptions& options, std::string_view command, const Show& show) {
+    return Batch(options, command, show).run();
+}
+
+} // namespace tool

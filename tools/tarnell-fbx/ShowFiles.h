@@ -1,0 +1,53 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// One command, many files: what every command that looks into files does around its own work.
+#pragma once
+
+#include <functional>
+#include <ostream>
+#include <string>
+#include <string_view>
+
+#include "Commands.h"
+#include "JsonWriter.h"
+#include "Terminal.h"
+
+namespace tool {
+
+/// What is printed about one file.
+class Page {
+public:
+    Page(const std::string& file, Form form, const Terminal& terminal, std::ostream& out, std::string_view separator)
+        : mFile(file), mForm(form), mTerminal(terminal), mOut(out), mSeparator(separator) {}
+
+    [[nodiscard]] const std::string& file() const { return mFile; }
+    [[nodiscard]] Form form() const { return mForm; }
+    [[nodiscard]] bool isJson() const { return mForm == Form::json || mForm == Form::jsonLines; }
+    [[nodiscard]] const Terminal& terminal() const { return mTerminal; }
+
+    /// The stream, once it is certain that the file can be read. From here on nothing should fail any more.
+    std::ostream& begin();
+    /// Prints a JSON object that begins with the keys that all have: the format's name, the file's name, and then what
+    /// `content` adds.
+    void json(std::string_view command, const std::function<void(JsonWriter&)>& content);
+    [[nodiscard]] bool begun() const { return mBegun; }
+
+private:
+    const std::string& mFile;
+    Form mForm;
+    const Terminal& mTerminal;
+    std::ostream& mOut;
+    std::string_view mSeparator;
+    bool mBegun = false;
+};
+
+/// Prints a page; throws Unreadable, before it begins, when there is none. Hands out an exit status. Several run at the
+/// same time when the user asks for it.
+using Show = std::function<int(Page&)>;
+
+/// Shows all files in their order. A file that fails does not keep the others from being shown; the status is that of
+/// the worst. As JSON, several files are an array, or a line each, and the place of a file that failed says why.
+int showFiles(const LookOptions& options, std::string_view command, const Show& show);
+
+} // namespace tool

@@ -1,0 +1,70 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Similar names, by the number of letters to insert, leave out or replace.
+#include "Similarity.h"
+
+#include <algorithm>
+#include <cctype>
+#include <map>
+#include <numeric>
+
+namespace tool {
+namespace {
+
+constexpr std::size_t kMostNames = 3;
+constexpr std::size_t kLongest = 64; // no name of that length is typed
+
+std::string lowered(std::string_view text) {
+    std::string lower(text);
+    std::transform(lower.begin(), lower.end(), lower.begin(),
+                   [](unsigned char letter) { return static_cast<char>(std::tolower(letter)); });
+    return lower;
+}
+
+std::size_t editDistance(std::string_view a, std::string_view b) {
+    std::vector<std::size_t> row(b.size() + 1);
+    std::iota(row.begin(), row.end(), std::size_t{0});
+    for (std::size_t i = 0; i < a.size(); ++i) {
+        std::size_t diagonal = row[0];
+        row[0] = i + 1;
+        for (std::size_t j = 0; j < b.size(); ++j) {
+            const std::size_t replaced = diagonal + (a[i] == b[j] ? 0 : 1);
+            diagonal = row[j + 1];
+            row[j + 1] = std::min({replaced, row[j] + 1, diagonal + 1});
+        }
+    }
+    return row.back();
+}
+
+/// Smaller is more similar; none when the two have nothing to do with each other.
+constexpr std::size_t kUnrelated = 1000;
+std::size_t difference(const std::string& text, const std::string& name) {
+    if (name.size() > kLongest || name.empty())
+        return kUnrelated;
+    if (text == name)
+        return 0;
+    const std::size_t distance = editDistance(text, name);
+    const bool isPart = text.size() >= 3 && name.find(text) != std::string::npos;
+    return isPart || distance <= std::max<std::size_t>(text.size() / 3, 1) ? distance : kUnrelated;
+}
+
+} // namespace
+
+std::vector<std::string> mostSimilar(std::string_view text, const std::vector<std::string>& names) {
+    const std::string wanted = lowered(text.substr(0, kLongest));
+    std::multimap<std::size_t, const std::string*> ranked;
+    for (const std::string& name : names) {
+        const std::size_t distance = difference(wanted, lowered(name));
+        if (distance != kUnrelated)
+            ranked.emplace(distance, &name);
+    }
+    std::vector<std::string> best;
+    for (const auto& [distance, name] : ranked) {
+        if (best.size() < kMostNames && std::find(best.begin(), best.end(), *name) == best.end())
+            best.push_back(*name);
+    }
+    return best;
+}
+
+} // namespace tool

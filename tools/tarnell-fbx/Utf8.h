@@ -1,0 +1,28 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Characters of UTF-8 text, and how many columns they take.
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+namespace tool {
+
+struct Utf8Character {
+    char32_t code = 0;
+    std::size_t size = 1; ///< bytes
+    bool valid = false;   ///< else one byte that begins no character
+};
+
+/// The character that begins at a byte of the text.
+Utf8Character utf8At(std::string_view text, std::size_t at);
+
+/// Columns of a terminal that the text takes: two for wide characters, none for those that combine.
+std::size_t displayWidth(std::string_view text);
+
+/// The text in at most so many columns; where it was cut, it ends in "…".
+std::string fitted(std::string_view text, std::size_t columns);
+
+} // namespace tool
