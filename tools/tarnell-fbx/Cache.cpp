@@ -134,7 +134,8 @@ bool isMax(const CacheFacts& facts) { return facts.format == FbxCache::eMaxPoint
 
 std::string kindText(const CacheFacts& facts) {
     if (isMax(facts))
-        return "Max point cache, " + numberText(facts.framesPerSample) + " frames per sample";
+        return "Max point cache, " + numberText(facts.framesPerSample) +
+               (facts.framesPerSample == 1.0 ? " frame per sample" : " frames per sample");
     std::string text = std::string("Maya cache, ") + (facts.wide ? "64-bit" : "32-bit") + " chunks, " +
                        (facts.oneFile ? "all samples in one file" : "a file per sample");
     if (facts.frameRate > 0.0)
@@ -174,7 +175,7 @@ void printChannels(const CacheFacts& facts, std::ostream& out, const Terminal& t
         const bool isStated = std::any_of(facts.channels.begin(), facts.channels.end(),
                                           [&name = name](const auto& channel) { return channel.name == name; });
         if (!isStated)
-            addRow(name, "", isMax(facts) ? framesText(facts.start, facts.end) : "");
+            addRow(name, isMax(facts) ? "points" : "", isMax(facts) ? framesText(facts.start, facts.end) : "");
     }
     if (!table.empty())
         table.print(out, terminal, 2);
@@ -370,8 +371,13 @@ int cache(const CacheOptions& options) {
             if (entries.empty())
                 out << "  no mesh has a point cache\n";
         }
-        const bool sound = std::all_of(entries.begin(), entries.end(), [](const auto& each) { return each.isSound(); });
-        return options.verify && !sound ? kUnreadable : kSuccess;
+        const auto faulty =
+            std::count_if(entries.begin(), entries.end(), [](const CacheEntry& each) { return !each.isSound(); });
+        if (!options.verify || faulty == 0)
+            return kSuccess;
+        printError(page.file(),
+                   std::to_string(faulty) + " of " + std::to_string(entries.size()) + " caches with faults");
+        return kUnreadable;
     });
 }
 

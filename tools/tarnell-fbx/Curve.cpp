@@ -110,8 +110,13 @@ private:
         for (const Channel& channel : channels) {
             if (!only.empty() && channel.name != only)
                 continue;
-            mChannels.push_back({&object, channel});
             added = true;
+            // A node answers for its attribute, which may have the same name.
+            const bool isKnown = std::any_of(mChannels.begin(), mChannels.end(), [&](const ChosenChannel& each) {
+                return each.channel.property == channel.property && each.channel.component == channel.component;
+            });
+            if (!isKnown)
+                mChannels.push_back({&object, channel});
         }
         mFound = mFound || added;
         return added;
@@ -191,19 +196,19 @@ void printCurve(const Curves& curves, const LayerCurve& each, std::ostream& out,
                  {"Value", Table::Align::right, Ink::number},
                  {"To the next"},
                  {"Tangents"},
-                 {"Left", Table::Align::right},
-                 {"Right", Table::Align::right},
+                 {"Left slope", Table::Align::right},
+                 {"Right slope", Table::Align::right},
                  {"Remarks"}});
     for (const KeyFacts& key : keys) {
         table.addRow({shortNumber(curves.frameOf(key.time)), shortNumber(key.time.GetSecondDouble()),
                       exactText(key.value), key.interpolation, key.tangent,
-                      key.leftSlope ? exactText(*key.leftSlope) : "", key.rightSlope ? exactText(*key.rightSlope) : "",
-                      key.remarks()});
+                      key.leftSlope ? numberText(*key.leftSlope) : "",
+                      key.rightSlope ? numberText(*key.rightSlope) : "", key.remarks()});
     }
     table.print(out, terminal, 4);
 }
 
-void printSamples(const Curves& curves, std::ostream& out) {
+void printSamples(const Curves& curves, const Terminal& terminal, std::ostream& out) {
     out << "\nSamples, all layers together\n";
     std::vector<Table::Column> columns{{"Frame", Table::Align::right}, {"Seconds", Table::Align::right}};
     for (const ChosenChannel& chosen : curves.channels)
@@ -216,7 +221,7 @@ void printSamples(const Curves& curves, std::ostream& out) {
             cells.push_back(numberText(chosen.channel.valueAt(time)));
         table.addRow(std::move(cells));
     }
-    table.print(out, standardTerminal(), 2);
+    table.print(out, terminal, 2);
 }
 
 void printTitle(const Curves& curves, Page& page, std::ostream& out) {
@@ -242,7 +247,7 @@ void printText(const Curves& curves, Page& page) {
             printCurve(curves, each, out, page.terminal());
     }
     if (curves.range && !curves.channels.empty())
-        printSamples(curves, out);
+        printSamples(curves, page.terminal(), out);
 }
 
 void plotChannel(const Curves& curves, ChosenChannel& chosen, Page& page, std::ostream& out) {

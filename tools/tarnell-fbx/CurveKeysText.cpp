@@ -1,9 +1,12 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Keys in words. A key holds its right slope and the left slope of the next key, so that what stands left of a key is
-// asked of the one before it.
+// Keys in words.
 #include "CurveKeysText.h"
+
+#include <cmath>
+
+#include <fbxsdk/extensions/CurveSlopes.h>
 
 #include "SceneFacts.h"
 
@@ -44,23 +47,23 @@ bool isCubic(const FbxAnimCurve& curve, int key) {
 
 bool isTcb(const FbxAnimCurve& curve, int key) { return has(curve.KeyGetTangentMode(key), Def::eTangentTCB); }
 
-void addLeft(const FbxAnimCurve& curve, int key, KeyFacts& facts) {
-    const int before = key - 1;
-    if (!isCubic(curve, before) || isTcb(curve, before))
-        return;
-    facts.leftSlope = curve.KeyGetData(before, Def::eNextLeftSlope);
-    const float weight = curve.KeyGetData(before, Def::eNextLeftWeight);
-    if (weight != Def::sDEFAULT_WEIGHT)
-        facts.leftWeight = weight;
+/// A weight that is not the usual third.
+std::optional<double> unusual(double weight) {
+    constexpr double kClose = 1e-6;
+    const bool isUsual = std::abs(weight - static_cast<double>(Def::sDEFAULT_WEIGHT)) < kClose;
+    return isUsual ? std::nullopt : std::optional(weight);
 }
 
-void addRight(const FbxAnimCurve& curve, int key, KeyFacts& facts) {
-    if (!isCubic(curve, key) || isTcb(curve, key))
-        return;
-    facts.rightSlope = curve.KeyGetData(key, Def::eRightSlope);
-    const float weight = curve.KeyGetData(key, Def::eRightWeight);
-    if (weight != Def::sDEFAULT_WEIGHT)
-        facts.rightWeight = weight;
+void addSlopes(const FbxAnimCurve& curve, int key, KeyFacts& facts) {
+    const extensions::KeySlopes slopes = extensions::slopesAt(curve, key);
+    if (isCubic(curve, key - 1)) {
+        facts.leftSlope = slopes.left;
+        facts.leftWeight = unusual(slopes.leftWeight);
+    }
+    if (isCubic(curve, key)) {
+        facts.rightSlope = slopes.right;
+        facts.rightWeight = unusual(slopes.rightWeight);
+    }
 }
 
 KeyFacts factsOf(const FbxAnimCurve& curve, int key) {
@@ -74,8 +77,7 @@ KeyFacts factsOf(const FbxAnimCurve& curve, int key) {
         facts.clamped = has(mode, Def::eTangentGenericClamp);
         facts.timeIndependent = has(mode, Def::eTangentGenericTimeIndependent);
     }
-    addLeft(curve, key, facts);
-    addRight(curve, key, facts);
+    addSlopes(curve, key, facts);
     if (isCubic(curve, key) && isTcb(curve, key)) {
         facts.tension = curve.KeyGetData(key, Def::eTCBTension);
         facts.continuity = curve.KeyGetData(key, Def::eTCBContinuity);
@@ -112,9 +114,9 @@ std::string KeyFacts::remarks() const {
     if (timeIndependent)
         add("time-independent");
     if (leftWeight)
-        add("left weight " + exactText(*leftWeight));
+        add("left weight " + numberText(*leftWeight));
     if (rightWeight)
-        add("right weight " + exactText(*rightWeight));
+        add("right weight " + numberText(*rightWeight));
     if (tension)
         add("tension " + exactText(*tension) + ", continuity " + exactText(*continuity) + ", bias " + exactText(*bias));
     return text;
@@ -140,7 +142,7 @@ void printShape(const KeyFacts& key, JsonWriter& json) {
     json.text("tangent", key.tangent);
     json.boolean("clamped", key.clamped);
     json.boolean("timeIndependent", key.timeIndependent);
-    const auto add = [&](const char* name, const std::optional<float>& number) {
+    const auto add = [&](const char* name, const auto& number) {
         json.key(name);
         if (number) {
             json.real(*number);

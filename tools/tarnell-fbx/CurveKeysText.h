@@ -21,8 +21,8 @@ struct KeyFacts {
     std::string tangent;            ///< auto, user, broken, auto broken, TCB; empty where there is none
     bool clamped = false;           ///< flat where the neighbours are no further up or down
     bool timeIndependent = false;
-    std::optional<float> leftSlope, rightSlope;   ///< per second, where a cubic piece begins or ends
-    std::optional<float> leftWeight, rightWeight; ///< where they are in force
+    std::optional<double> leftSlope, rightSlope;   ///< in force, per second, where a cubic piece begins or ends
+    std::optional<double> leftWeight, rightWeight; ///< in force, where they are not the usual third
     std::optional<float> tension, continuity, bias;
 
     /// What has no column of its own.

@@ -5,6 +5,7 @@
 #include "SceneFacts.h"
 
 #include <charconv>
+#include <cmath>
 #include <cstdio>
 
 #include "TerminalText.h"
@@ -17,17 +18,24 @@ std::string numberText(double value) {
     return text;
 }
 
-std::string exactText(double value) {
-    char digits[32];
-    const auto [end, error] = std::to_chars(digits, digits + sizeof digits, value);
+namespace {
+
+template <class Real>
+std::string shortest(Real value) {
+    // Shortest alone would have 100000 as 1e+05.
+    constexpr double kSmall = 1e-5, kLarge = 1e15;
+    const double size = std::abs(static_cast<double>(value));
+    const bool isUsual = (size >= kSmall && size < kLarge) || size == 0.0;
+    char digits[64];
+    const auto [end, error] = isUsual ? std::to_chars(digits, digits + sizeof digits, value, std::chars_format::fixed)
+                                      : std::to_chars(digits, digits + sizeof digits, value);
     return {digits, end};
 }
 
-std::string exactText(float value) {
-    char digits[32];
-    const auto [end, error] = std::to_chars(digits, digits + sizeof digits, value);
-    return {digits, end};
-}
+} // namespace
+
+std::string exactText(double value) { return shortest(value); }
+std::string exactText(float value) { return shortest(value); }
 
 std::string sizeText(std::uintmax_t bytes) {
     constexpr double kKibi = 1024.0;

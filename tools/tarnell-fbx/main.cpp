@@ -10,6 +10,7 @@
 #include <functional>
 #include <iostream>
 #include <map>
+#include <sstream>
 #include <string_view>
 #include <system_error>
 
@@ -19,6 +20,7 @@
 
 #include "Commands.h"
 #include "LookCommands.h"
+#include "Manual.h"
 #include "Similarity.h"
 #include "StandardOutput.h"
 #include "TerminalText.h"
@@ -122,8 +124,8 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
 }
 
 constexpr const char* kStatuses =
-    "Exit status: 0 all is well; 1 something could not be read or written; 2 wrong usage;\n"
-    "3 done, but with --strict: not everything came over.";
+    "Exit status: 0 all is well; 1 something could not be read or written; 2 wrong usage; "
+    "3 done, but with --strict: not everything came over.\n";
 
 /// What the first word is, when it is no option; a command that there is not gets an answer of its own.
 std::string unknownCommand(const CLI::App& app, const std::string& word) {
@@ -150,8 +152,35 @@ int help(CLI::App& app, const std::string& command) {
         std::cerr << "tarnell-fbx: " << tool::terminalText(unknown) << '\n';
         return tool::kWrongUsage;
     }
-    std::cout << (command == "help" ? app.help() : app.get_subcommand(command)->help());
+    std::cout << (command == "help" ? app.help() : app.get_subcommand(command)->help("tarnell-fbx"));
     return tool::kSuccess;
+}
+
+/// Adds what the build asks for: it is no help to people.
+void addSources(CLI::App& app, std::function<int()>& chosen) {
+    CLI::App* manual = app.add_subcommand("manual", "Print the manual page, for man")->group("");
+    manual->callback([&app, &chosen] {
+        chosen = [&app]() -> int {
+            tool::writeManual(app, std::cout);
+            return tool::kSuccess;
+        };
+    });
+    CLI::App* completion = app.add_subcommand("completion", "Print what completes command lines in a shell");
+    completion
+        ->add_option_function<std::string>(
+            "SHELL",
+            [&app, &chosen](const std::string& shell) {
+                std::ostringstream text;
+                if (!tool::writeCompletion(app, shell, text))
+                    throw CLI::ValidationError("SHELL", "no completions for " + shell + "; for bash, zsh and fish");
+                chosen = [text = std::move(text).str()]() -> int {
+                    std::cout << text;
+                    return tool::kSuccess;
+                };
+            },
+            "bash, zsh or fish")
+        ->required()
+        ->type_name("");
 }
 
 int run(int argc, char** argv) {
@@ -165,6 +194,7 @@ int run(int argc, char** argv) {
     addDump(app, dumpOptions);
     tool::ConvertOptions convertOptions;
     addConvert(app, convertOptions);
+    addSources(app, chosen);
 
     const std::vector<std::string> words(argv + 1, argv + argc);
     if (!words.empty() && words[0] == "help")
