@@ -318,8 +318,7 @@ class Options(Document):
                 (fixture("markers_7400_ascii.fbx"), "capsule", ["markers", "transforms"]),
                 (fixture("nulls_7400_ascii.fbx"), "child", ["nulls", "transforms"]),
                 (meshes, "shape", ["transforms", "meshes"]), (meshes, "other", ["transforms", "meshes"]),
-                (fixture("camera_7400_ascii.fbx"), "shot", ["cameras"]), (meshes, "Producer Top", ["cameras"]),
-                (meshes, "Shape", [])):
+                (fixture("camera_7400_ascii.fbx"), "shot", ["cameras"]), (meshes, "Producer Top", ["cameras"])):
             with self.subTest(name):
                 everything, picked = dump(file), dump("--name", name, file)
                 self.assertEqual(list(picked), list(everything))
@@ -327,6 +326,8 @@ class Options(Document):
                     wanted = [each for each in everything[kind] if each["name"] == name]
                     self.assertEqual(len(wanted), 1 if kind in kinds else 0)
                     self.assertEqual(picked[kind], wanted)
+        result = run("dump", "--name", "Shape", meshes)  # "shape" is another name
+        self.assertEqual((result.returncode, result.stdout), (1, ""))
 
 
 unittest.main(argv=sys.argv[:1], verbosity=0)

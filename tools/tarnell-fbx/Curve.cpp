@@ -5,6 +5,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include <strings.h>
+
 #include <fbxsdk.h>
 
 #include "Commands.h"
@@ -84,8 +86,10 @@ private:
         mFound = true;
         for (FbxObject* part : withAttributes(object)) {
             for (const FbxProperty& property : propertiesOf(*part)) {
-                if (keyCount(property, mTake) > 0)
-                    add(*part, channelsOf(property, mTake), "");
+                for (const Channel& channel : channelsOf(property, mTake)) {
+                    if (!channel.curves.empty())
+                        add(*part, {channel}, "");
+                }
             }
         }
     }
@@ -108,7 +112,7 @@ private:
     bool add(const FbxObject& object, const std::vector<Channel>& channels, const std::string& only) {
         bool added = false;
         for (const Channel& channel : channels) {
-            if (!only.empty() && channel.name != only)
+            if (!only.empty() && strcasecmp(channel.name.c_str(), only.c_str()) != 0)
                 continue;
             added = true;
             // A node answers for its attribute, which may have the same name.
@@ -188,8 +192,8 @@ void printCurve(const Curves& curves, const LayerCurve& each, std::ostream& out,
     const auto [low, high] = std::minmax_element(
         keys.begin(), keys.end(), [](const KeyFacts& a, const KeyFacts& b) { return a.value < b.value; });
     out << "  " << keys.size() << (keys.size() == 1 ? " key" : " keys") << " on layer "
-        << inQuotes(each.layer->GetName()) << ", values " << exactText(low->value) << " to " << exactText(high->value)
-        << "; before " << extrapolationText(extrapolationBefore(*each.curve)) << ", after "
+        << inQuotes(each.layer->GetName()) << ", with values from " << exactText(low->value) << " to "
+        << exactText(high->value) << "; before " << extrapolationText(extrapolationBefore(*each.curve)) << ", after "
         << extrapolationText(extrapolationAfter(*each.curve)) << '\n';
     Table table({{"Frame", Table::Align::right},
                  {"Seconds", Table::Align::right},

@@ -47,22 +47,15 @@ bool isCubic(const FbxAnimCurve& curve, int key) {
 
 bool isTcb(const FbxAnimCurve& curve, int key) { return has(curve.KeyGetTangentMode(key), Def::eTangentTCB); }
 
-/// A weight that is not the usual third.
-std::optional<double> unusual(double weight) {
-    constexpr double kClose = 1e-6;
-    const bool isUsual = std::abs(weight - static_cast<double>(Def::sDEFAULT_WEIGHT)) < kClose;
-    return isUsual ? std::nullopt : std::optional(weight);
-}
-
 void addSlopes(const FbxAnimCurve& curve, int key, KeyFacts& facts) {
     const extensions::KeySlopes slopes = extensions::slopesAt(curve, key);
     if (isCubic(curve, key - 1)) {
         facts.leftSlope = slopes.left;
-        facts.leftWeight = unusual(slopes.leftWeight);
+        facts.leftWeight = slopes.leftWeight;
     }
     if (isCubic(curve, key)) {
         facts.rightSlope = slopes.right;
-        facts.rightWeight = unusual(slopes.rightWeight);
+        facts.rightWeight = slopes.rightWeight;
     }
 }
 
@@ -104,6 +97,12 @@ Extrapolation extrapolation(FbxAnimCurveBase::EExtrapolationType type, unsigned 
     return {"unknown", {}};
 }
 
+/// Whether a weight is another than the usual third; old files have it with four digits.
+bool isUnusual(const std::optional<double>& weight) {
+    constexpr double kClose = 1e-3;
+    return weight && std::abs(*weight - static_cast<double>(Def::sDEFAULT_WEIGHT)) > kClose;
+}
+
 } // namespace
 
 std::string KeyFacts::remarks() const {
@@ -113,9 +112,9 @@ std::string KeyFacts::remarks() const {
         add("clamped");
     if (timeIndependent)
         add("time-independent");
-    if (leftWeight)
+    if (isUnusual(leftWeight))
         add("left weight " + numberText(*leftWeight));
-    if (rightWeight)
+    if (isUnusual(rightWeight))
         add("right weight " + numberText(*rightWeight));
     if (tension)
         add("tension " + exactText(*tension) + ", continuity " + exactText(*continuity) + ", bias " + exactText(*bias));

@@ -22,7 +22,7 @@ struct KeyFacts {
     bool clamped = false;           ///< flat where the neighbours are no further up or down
     bool timeIndependent = false;
     std::optional<double> leftSlope, rightSlope;   ///< in force, per second, where a cubic piece begins or ends
-    std::optional<double> leftWeight, rightWeight; ///< in force, where they are not the usual third
+    std::optional<double> leftWeight, rightWeight; ///< in force, of those sides: lengths of the handles
     std::optional<float> tension, continuity, bias;
 
     /// What has no column of its own.

@@ -196,15 +196,23 @@ public:
         bool complete = true;
         for (const Kind& kind : kinds()) {
             if (wanted(kind.name))
-                complete = kind.print(*this) && complete;
+                complete = kind.print(*this, kind) && complete;
         }
         mJson.endObject();
         return complete;
     }
 
+    /// Whether there is anything of the name that was asked for, of the kinds that were.
+    bool finds() {
+        const auto isFound = [this](const Kind& kind) { return wanted(kind.name) && count(kind) > 0; };
+        return !mOptions.name || std::any_of(kinds().begin(), kinds().end(), isFound);
+    }
+
     struct Kind {
         const char* name;
-        std::function<bool(Dump&)> print;
+        int (FbxSdk::*candidates)() const;
+        int mask;
+        std::function<bool(Dump&, const Kind&)> print;
     };
     static const std::vector<Kind>& kinds();
 
@@ -238,12 +246,15 @@ private:
         mJson.endObject();
     }
 
+    int count(const Kind& kind) {
+        return mFbx.getNumberOfObjects((mSdk.*kind.candidates)(), mInfo.getAllObjects(), kind.mask,
+                                       mInfo.getObjectName(), mSdk);
+    }
+
     /// Reads all objects of one kind, or the named one, and hands each to `each`.
     template <class Object, class Each>
-    bool read(int (FbxSdk::*count)() const, int mask, bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int),
-              const Each& each) {
-        const int number =
-            mFbx.getNumberOfObjects((mSdk.*count)(), mInfo.getAllObjects(), mask, mInfo.getObjectName(), mSdk);
+    bool read(const Kind& kind, bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int), const Each& each) {
+        const int number = count(kind);
         if (number < 1)
             return true;
         const std::unique_ptr<Object[]> objects(new Object[static_cast<std::size_t>(number)]);
@@ -254,11 +265,10 @@ private:
     }
 
     template <class Object>
-    bool printKind(const char* name, int (FbxSdk::*count)() const, int mask,
-                   bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int)) {
-        mJson.key(name);
+    bool printKind(const Kind& kind, bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int)) {
+        mJson.key(kind.name);
         mJson.beginArray();
-        const bool complete = read<Object>(count, mask, fill, [&](Object& object) {
+        const bool complete = read<Object>(kind, fill, [&](Object& object) {
             mJson.beginObject();
             mPrinter.transform(object);
             mPrinter.details(object);
@@ -268,8 +278,8 @@ private:
         return complete;
     }
 
-    bool printMeshes() {
-        mJson.key("meshes");
+    bool printMeshes(const Kind& kind) {
+        mJson.key(kind.name);
         mJson.beginArray();
         bool complete = true;
         const bool ranged = mOptions.frames.has_value();
@@ -278,7 +288,7 @@ private:
         for (long long frame = first; frame <= last; ++frame) {
             const float at = ranged ? static_cast<float>(frame) : mOptions.frame;
             mInfo.setFrame(at);
-            complete = read<TnFbxMesh>(&FbxSdk::getNumberOfMeshes, 4, &FbxSdk::getMeshes,
+            complete = read<TnFbxMesh>(kind, &FbxSdk::getMeshes,
                                        [&](TnFbxMesh& mesh) {
                                            mJson.beginObject();
                                            mPrinter.transform(mesh);
@@ -303,24 +313,17 @@ private:
 
 const std::vector<Dump::Kind>& Dump::kinds() {
     static const std::vector<Kind> kKinds = {
-        {"cameras",
-         [](Dump& d) {
-             return d.printKind<TnFbxCamera>("cameras", &FbxSdk::getNumberOfCameras, 32, &FbxSdk::getCameras);
-         }},
-        {"lights",
-         [](Dump& d) { return d.printKind<TnFbxLight>("lights", &FbxSdk::getNumberOfLights, 64, &FbxSdk::getLights); }},
-        {"markers",
-         [](Dump& d) {
-             return d.printKind<TnFbxMarker>("markers", &FbxSdk::getNumberOfMarkers, 1, &FbxSdk::getMarkers);
-         }},
-        {"nulls",
-         [](Dump& d) { return d.printKind<TnFbxNull>("nulls", &FbxSdk::getNumberOfNulls, 0x4000, &FbxSdk::getNulls); }},
-        {"transforms",
-         [](Dump& d) {
-             return d.printKind<TnFbxTransform>("transforms", &FbxSdk::getNumberOfTransforms, 0x4005,
-                                                &FbxSdk::getTransforms);
-         }},
-        {"meshes", [](Dump& d) { return d.printMeshes(); }},
+        {"cameras", &FbxSdk::getNumberOfCameras, 32,
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxCamera>(kind, &FbxSdk::getCameras); }},
+        {"lights", &FbxSdk::getNumberOfLights, 64,
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxLight>(kind, &FbxSdk::getLights); }},
+        {"markers", &FbxSdk::getNumberOfMarkers, 1,
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxMarker>(kind, &FbxSdk::getMarkers); }},
+        {"nulls", &FbxSdk::getNumberOfNulls, 0x4000,
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxNull>(kind, &FbxSdk::getNulls); }},
+        {"transforms", &FbxSdk::getNumberOfTransforms, 0x4005,
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxTransform>(kind, &FbxSdk::getTransforms); }},
+        {"meshes", &FbxSdk::getNumberOfMeshes, 4, [](Dump& d, const Kind& kind) { return d.printMeshes(kind); }},
     };
     return kKinds;
 }
@@ -341,6 +344,10 @@ int dump(const DumpOptions& options) {
     Dump dump(options, std::cout);
     if (!dump.load()) {
         printError(options.file, lastError());
+        return kUnreadable;
+    }
+    if (!dump.finds()) {
+        printError(options.file, "it has no object \"" + *options.name + "\" of the kinds that were asked for");
         return kUnreadable;
     }
     const bool complete = dump.print();

@@ -89,6 +89,7 @@ private:
         Page page(file, mForm, mTerminal, out, separator);
         const Outcome outcome = attempt([&] { return mShow(page); });
         if (!outcome.reason.empty()) {
+            out.flush(); // on a terminal the pages before it come before the error
             printError(file, outcome.reason);
             if (page.isJson() && !page.begun()) {
                 page.json(mCommand, [&](JsonWriter& json) {

@@ -1,13 +1,14 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Similar names, by the number of letters to insert, leave out or replace.
+// Similar names, by the number of letters to insert, leave out, replace or swap with the next one.
 #include "Similarity.h"
 
 #include <algorithm>
 #include <cctype>
 #include <map>
 #include <numeric>
+#include <utility>
 
 namespace tool {
 namespace {
@@ -23,15 +24,17 @@ std::string lowered(std::string_view text) {
 }
 
 std::size_t editDistance(std::string_view a, std::string_view b) {
-    std::vector<std::size_t> row(b.size() + 1);
+    // A row per letter of a: the distances of its beginnings from those of b.
+    std::vector<std::size_t> twoBefore(b.size() + 1), before(b.size() + 1), row(b.size() + 1);
     std::iota(row.begin(), row.end(), std::size_t{0});
-    for (std::size_t i = 0; i < a.size(); ++i) {
-        std::size_t diagonal = row[0];
-        row[0] = i + 1;
-        for (std::size_t j = 0; j < b.size(); ++j) {
-            const std::size_t replaced = diagonal + (a[i] == b[j] ? 0 : 1);
-            diagonal = row[j + 1];
-            row[j + 1] = std::min({replaced, row[j] + 1, diagonal + 1});
+    for (std::size_t i = 1; i <= a.size(); ++i) {
+        twoBefore = std::exchange(before, row);
+        row[0] = i;
+        for (std::size_t j = 1; j <= b.size(); ++j) {
+            row[j] = std::min({before[j - 1] + (a[i - 1] == b[j - 1] ? 0 : 1), row[j - 1] + 1, before[j] + 1});
+            const bool isSwapped = i > 1 && j > 1 && a[i - 1] == b[j - 2] && a[i - 2] == b[j - 1];
+            if (isSwapped)
+                row[j] = std::min(row[j], twoBefore[j - 2] + 1);
         }
     }
     return row.back();

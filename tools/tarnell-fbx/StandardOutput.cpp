@@ -5,6 +5,7 @@
 #include "StandardOutput.h"
 
 #include <cerrno>
+#include <iostream>
 
 #include <unistd.h>
 
@@ -16,6 +17,9 @@ CheckedOutput::CheckedOutput(std::ostream& stream, int descriptor)
     : mStream(stream), mBefore(stream.rdbuf()), mExceptionsBefore(stream.exceptions()), mDescriptor(descriptor) {
     setp(mBuffer.data(), mBuffer.data() + mBuffer.size());
     mStream.rdbuf(this);
+    // Standard error would flush the stream before it prints: on whatever thread that happens, and once more when
+    // standard output has failed.
+    std::cerr.tie(nullptr);
     // What writing throws comes through the stream only when the stream itself would throw.
     mStream.exceptions(std::ios::badbit);
 }

@@ -220,12 +220,12 @@ int run(int argc, char** argv) {
 
 /// Runs, and sees to it that all of what was printed arrives.
 int runToTheEnd(int argc, char** argv) {
-    tool::CheckedOutput output(std::cout, STDOUT_FILENO);
     try {
+        tool::CheckedOutput output(std::cout, STDOUT_FILENO);
         const int status = run(argc, argv);
         output.finish();
         return status;
-    } catch (const tool::OutputFailure& failure) {
+    } catch (const tool::OutputFailure& failure) { // the stream is an ordinary one again
         if (!failure.readerLeft())
             tool::printError("standard output", std::generic_category().message(failure.systemError()));
         return tool::kUnreadable;
