@@ -187,13 +187,37 @@ std::string extrapolationText(const Extrapolation& extrapolation) {
     return text;
 }
 
+const char* blendName(const FbxAnimLayer& layer) {
+    switch (layer.BlendMode.Get()) {
+    case FbxAnimLayer::eBlendOverride:
+        return "override";
+    case FbxAnimLayer::eBlendOverridePassthrough:
+        return "override, passes through";
+    default:
+        return "additive";
+    }
+}
+
+/// What keeps a layer from counting in full.
+std::string layerRemarks(const FbxAnimLayer& layer) {
+    std::string text;
+    if (layer.BlendMode.Get() != FbxAnimLayer::eBlendAdditive)
+        text += std::string(", ") + blendName(layer);
+    if (layer.Weight.Get() != 100.0)
+        text += ", weight " + numberText(layer.Weight.Get()) + " %";
+    if (layer.Mute.Get())
+        text += ", muted";
+    return layer.Solo.Get() ? text + ", solo" : text;
+}
+
 void printCurve(const Curves& curves, const LayerCurve& each, std::ostream& out, const Terminal& terminal) {
     const std::vector<KeyFacts> keys = keyFacts(*each.curve);
     const auto [low, high] = std::minmax_element(
         keys.begin(), keys.end(), [](const KeyFacts& a, const KeyFacts& b) { return a.value < b.value; });
     out << "  " << keys.size() << (keys.size() == 1 ? " key" : " keys") << " on layer "
-        << inQuotes(each.layer->GetName()) << ", with values from " << exactText(low->value) << " to "
-        << exactText(high->value) << "; before " << extrapolationText(extrapolationBefore(*each.curve)) << ", after "
+        << inQuotes(each.layer->GetName()) << layerRemarks(*each.layer) << ", with values from "
+        << exactText(low->value) << " to " << exactText(high->value) << "; before "
+        << extrapolationText(extrapolationBefore(*each.curve)) << ", after "
         << extrapolationText(extrapolationAfter(*each.curve)) << '\n';
     Table table({{"Frame", Table::Align::right},
                  {"Seconds", Table::Align::right},
@@ -325,6 +349,10 @@ void printExtrapolation(const char* key, const Extrapolation& extrapolation, Jso
 void printCurve(const Curves& curves, const LayerCurve& each, JsonWriter& json) {
     json.beginObject();
     json.text("layer", each.layer->GetName());
+    json.text("blend", blendName(*each.layer));
+    json.real("weight", each.layer->Weight.Get());
+    json.boolean("muted", each.layer->Mute.Get());
+    json.boolean("solo", each.layer->Solo.Get());
     printExtrapolation("before", extrapolationBefore(*each.curve), json);
     printExtrapolation("after", extrapolationAfter(*each.curve), json);
     json.key("keys");

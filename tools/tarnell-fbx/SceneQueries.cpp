@@ -60,7 +60,7 @@ std::vector<FbxProperty> propertiesOf(const FbxObject& object) {
 std::vector<FbxObject*> objectsNamed(FbxScene& scene, const std::string& name) {
     std::vector<FbxObject*> found;
     for (FbxObject* object : extensions::objectsOf(scene)) {
-        if (name == object->GetName())
+        if (!name.empty() && name == object->GetName())
             found.push_back(object);
     }
     std::stable_partition(found.begin(), found.end(), [](const FbxObject* object) { return object->Is<FbxNode>(); });
