@@ -159,6 +159,24 @@ class Terminals(Folder):
         dots = [line for line in plot.splitlines() if re.search("[\u2800-\u28ff]", line)]
         self.assertEqual({len(line) for line in dots}, {60})
 
+    def test_show_what_takes_long(self):
+        master, slave = pty.openpty()
+        files = [SHOT] * 20
+        process = subprocess.Popen([TOOL, "records", "--values", "0", *files], stdout=subprocess.PIPE, stderr=slave)
+        os.close(slave)
+        # Nobody reads the pages, so that work does not end; after a second it says where it is.
+        said = os.read(master, 4096).decode()
+        self.assertRegex(said, "^[0-9]+ of 20: ")
+        self.assertLessEqual(len(said), 78)
+        self.assertEqual(process.stdout.read().count(b"FBXHeaderExtension"), 20)
+        process.stdout.close()
+        self.assertEqual(process.wait(timeout=60), 0)
+        self.assertTrue(os.read(master, 4096).decode().endswith(" \r"))  # taken back
+        os.close(master)
+
+    def test_say_nothing_of_what_takes_no_time(self):
+        self.assertEqual(on_terminal("info", "--json", SHOT).count("\r"), 0)
+
     def test_names_cannot_write_on_them(self):
         file = edited("nulls_7400_ascii.fbx", self.path("a.fbx"),
                       ('"Model::parent", "Null"', '"Model::a\x1b[31mb\x07c\u202ed", "Null"'))

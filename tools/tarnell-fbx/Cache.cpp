@@ -11,6 +11,7 @@
 
 #include <fbxsdk.h>
 #include <fbxsdk/extensions/CacheFacts.h>
+#include <fbxsdk/extensions/FileFacts.h>
 
 #include "CacheCheck.h"
 #include "Commands.h"
@@ -94,9 +95,9 @@ CacheEntry entryOf(FbxMesh& mesh, FbxVertexCacheDeformer& deformer, bool verify)
 std::vector<CacheEntry> entriesOfScene(const std::string& file, bool verify) {
     const SceneFile opened(file);
     std::vector<CacheEntry> entries;
-    for (int i = 0; i < opened.scene().GetSrcObjectCount<FbxMesh>(); ++i) {
-        auto* mesh = opened.scene().GetSrcObject<FbxMesh>(i);
-        for (int d = 0; d < mesh->GetDeformerCount(FbxDeformer::eVertexCache); ++d) {
+    for (FbxObject* object : extensions::objectsOf(opened.scene())) {
+        auto* mesh = FbxCast<FbxMesh>(object);
+        for (int d = 0; mesh && d < mesh->GetDeformerCount(FbxDeformer::eVertexCache); ++d) {
             auto* deformer = FbxCast<FbxVertexCacheDeformer>(mesh->GetDeformer(d, FbxDeformer::eVertexCache));
             if (deformer)
                 entries.push_back(entryOf(*mesh, *deformer, verify));

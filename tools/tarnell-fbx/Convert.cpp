@@ -78,7 +78,10 @@ public:
         info.setMayaVertexCacheFormat(mOptions.cache == PointCache::maya);
         info.setStartFrame(static_cast<float>(firstFrame()));
         info.setEndFrame(static_cast<float>(mOptions.frames ? mOptions.frames->second : mTime.getEndFrame()));
-        return mFbx.writeFile(info, mCameras.chosen, mLights.chosen, mTransforms.chosen, mNulls.chosen, mMeshes.chosen);
+        const bool written =
+            mFbx.writeFile(info, mCameras.chosen, mLights.chosen, mTransforms.chosen, mNulls.chosen, mMeshes.chosen);
+        mProgress.hide();
+        return written;
     }
 
     /// Why reading failed.

@@ -4,6 +4,7 @@
 // Keys in words.
 #include "CurveKeysText.h"
 
+#include <algorithm>
 #include <cmath>
 
 #include <fbxsdk/extensions/CurveSlopes.h>
@@ -123,6 +124,7 @@ std::string KeyFacts::remarks() const {
 
 std::vector<KeyFacts> keyFacts(FbxAnimCurve& curve) {
     std::vector<KeyFacts> facts;
+    facts.reserve(static_cast<std::size_t>(std::max(curve.KeyGetCount(), 0)));
     for (int key = 0; key < curve.KeyGetCount(); ++key)
         facts.push_back(factsOf(curve, key));
     return facts;

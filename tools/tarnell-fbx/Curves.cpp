@@ -26,6 +26,7 @@ std::vector<Channel> channelsOf(const FbxProperty& property, FbxAnimStack* take)
     constexpr const char* kNames[] = {"X", "Y", "Z", "W"};
     std::vector<Channel> channels;
     const int components = componentCount(property);
+    channels.reserve(static_cast<std::size_t>(components));
     for (int i = 0; i < components; ++i)
         channels.push_back({property, i, components == 1 ? "" : kNames[i], {}});
     FbxProperty driven = property;

@@ -8,6 +8,7 @@
 #include <system_error>
 
 #include <fbxsdk.h>
+#include <fbxsdk/extensions/FileFacts.h>
 
 #include "CacheCheck.h"
 #include "Commands.h"
@@ -80,11 +81,11 @@ const char* nameOf(const FbxMesh& mesh) {
 /// Meshes that show without their point cache, or with a damaged one, and why.
 std::vector<CacheFault> cacheFaults(FbxScene& scene) {
     std::vector<CacheFault> faults;
-    for (int i = 0; i < scene.GetSrcObjectCount<FbxMesh>(); ++i) {
-        FbxMesh& mesh = *scene.GetSrcObject<FbxMesh>(i);
-        const std::string fault = cacheFault(mesh);
+    for (FbxObject* object : extensions::objectsOf(scene)) {
+        auto* mesh = FbxCast<FbxMesh>(object);
+        const std::string fault = mesh ? cacheFault(*mesh) : std::string();
         if (!fault.empty())
-            faults.push_back({nameOf(mesh), fault});
+            faults.push_back({nameOf(*mesh), fault});
     }
     return faults;
 }

@@ -1,9 +1,10 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Progress.
+// Progress, printed on a thread of its own: whoever works may be busy for long between two things to say.
 #include "Progress.h"
 
+#include <chrono>
 #include <iostream>
 
 #include "TerminalText.h"
@@ -12,29 +13,50 @@
 namespace tool {
 namespace {
 
-using Clock = std::chrono::steady_clock;
 constexpr auto kPatience = std::chrono::seconds(1);
 constexpr auto kBetweenLines = std::chrono::milliseconds(100);
 constexpr std::size_t kMostColumns = 78; // a line that breaks cannot be taken back
 
 } // namespace
 
-Progress::Progress() : mShown(isTerminal(stderr)), mNext(Clock::now() + kPatience) {}
-
-void Progress::say(const std::string& text) {
-    if (!mShown || Clock::now() < mNext)
-        return;
-    mNext = Clock::now() + kBetweenLines;
-    clear();
-    const std::string line = fitted(terminalText(text), kMostColumns);
-    std::cerr << line << std::flush;
-    mLength = displayWidth(line);
+Progress::Progress() {
+    if (isTerminal(stderr))
+        mThread = std::jthread([this](const std::stop_token& stop) { work(stop); });
 }
 
-void Progress::clear() {
-    if (mLength > 0)
-        std::cerr << '\r' << std::string(mLength, ' ') << '\r' << std::flush;
-    mLength = 0;
+Progress::~Progress() {
+    mThread = {}; // stops and joins
+    hide();
+}
+
+void Progress::say(const std::string& text) {
+    const std::lock_guard lock(mMutex);
+    mText = fitted(terminalText(text), kMostColumns);
+}
+
+void Progress::hide() {
+    const std::lock_guard lock(mMutex);
+    mText.clear();
+    show();
+}
+
+void Progress::work(const std::stop_token& stop) {
+    std::unique_lock lock(mMutex);
+    const auto never = [] { return false; };
+    mChanged.wait_for(lock, stop, kPatience, never);
+    while (!stop.stop_requested()) {
+        show();
+        mChanged.wait_for(lock, stop, kBetweenLines, never);
+    }
+}
+
+/// Replaces the line that is shown. The mutex is held.
+void Progress::show() {
+    if (mText == mShown)
+        return;
+    const std::string blanks(displayWidth(mShown), ' ');
+    std::cerr << (blanks.empty() ? "" : '\r' + blanks + '\r') + mText << std::flush;
+    mShown = mText;
 }
 
 } // namespace tool

@@ -4,28 +4,37 @@
 // A line on standard error that says what is going on, for people who wait.
 #pragma once
 
-#include <chrono>
+#include <condition_variable>
+#include <cstddef>
+#include <mutex>
+#include <stop_token>
 #include <string>
+#include <thread>
 
 namespace tool {
 
-/// Nothing when standard error is no terminal, and nothing before a second has gone by. Gone when work is done.
+/// Nothing when standard error is no terminal, and nothing before a second has gone by, however long a single step
+/// takes. Gone when the object is.
 class Progress {
 public:
     Progress();
-    ~Progress() { clear(); }
+    ~Progress();
     Progress(const Progress&) = delete;
     Progress& operator=(const Progress&) = delete;
 
-    /// Replaces the line, at most ten times a second.
+    /// What is being done from now on.
     void say(const std::string& text);
+    /// Takes the line away until something is said again, for others who write on the terminal.
+    void hide();
 
 private:
-    void clear();
+    void work(const std::stop_token& stop);
+    void show();
 
-    bool mShown;
-    std::chrono::steady_clock::time_point mNext;
-    std::size_t mLength = 0; ///< columns that the line takes
+    std::mutex mMutex;
+    std::condition_variable_any mChanged;
+    std::string mText, mShown;
+    std::jthread mThread; ///< none where nothing is shown
 };
 
 } // namespace tool

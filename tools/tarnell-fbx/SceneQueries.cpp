@@ -34,11 +34,14 @@ std::vector<TreeNode> nodesInOrder(FbxScene& scene) {
     FbxNode& root = *scene.GetRootNode();
     for (int i = 0; i < root.GetChildCount(); ++i)
         appendTree({root.GetChild(i), -1, 0, i == root.GetChildCount() - 1, false}, nodes);
+    std::vector<FbxNode*> detached;
     for (int i = 0; i < scene.GetNodeCount(); ++i) {
         FbxNode* node = scene.GetNode(i);
         if (node != &root && !node->GetParent())
-            appendTree({node, -1, 0, true, true}, nodes);
+            detached.push_back(node);
     }
+    for (FbxNode* node : detached)
+        appendTree({node, -1, 0, node == detached.back(), true}, nodes);
     return nodes;
 }
 

@@ -15,12 +15,13 @@
 
 #include "FileList.h"
 #include "Progress.h"
+#include "TerminalText.h"
 
 namespace tool {
 
 std::ostream& Page::begin() {
     if (!mBegun)
-        mOut << mSeparator;
+        mBeforeBegin();
     mBegun = true;
     return mOut;
 }
@@ -85,11 +86,11 @@ private:
         bool done = false;
     };
 
-    int showOne(const std::string& file, std::ostream& out, std::string_view separator, bool& begun) {
-        Page page(file, mForm, mTerminal, out, separator);
+    int showOne(const std::string& file, std::ostream& out, const std::function<void()>& beforeBegin) {
+        Page page(file, mForm, mTerminal, out, beforeBegin);
         const Outcome outcome = attempt([&] { return mShow(page); });
         if (!outcome.reason.empty()) {
-            out.flush(); // on a terminal the pages before it come before the error
+            mProgress.hide();
             printError(file, outcome.reason);
             if (page.isJson() && !page.begun()) {
                 page.json(mCommand, [&](JsonWriter& json) {
@@ -98,21 +99,32 @@ private:
                 });
             }
         }
-        begun = begun || page.begun();
         return outcome.status;
     }
 
-    void announce(Progress& progress, std::size_t index) const {
-        if (mFiles.size() > 1)
-            progress.say(std::to_string(index + 1) + " of " + std::to_string(mFiles.size()) + ": " + mFiles[index]);
+    void announce(std::size_t index) {
+        mProgress.say(mFiles.size() > 1
+                          ? std::to_string(index + 1) + " of " + std::to_string(mFiles.size()) + ": " + mFiles[index]
+                          : "reading " + mFiles[index]);
+    }
+
+    /// A page follows: where people see pages and progress on one terminal, the line makes room.
+    void beginPage() {
+        if (mOutputIsShown)
+            mProgress.hide();
+        std::cout << (mBegun ? mFrame.between : "");
+        mBegun = true;
+    }
+    void endPage() const {
+        if (mOutputIsShown)
+            std::cout << std::flush;
     }
 
     void runInTurn() {
-        Progress progress;
-        bool begun = false;
         for (std::size_t i = 0; i < mFiles.size(); ++i) {
-            announce(progress, i);
-            mStatus = std::max(mStatus, showOne(mFiles[i], std::cout, begun ? mFrame.between : "", begun));
+            announce(i);
+            mStatus = std::max(mStatus, showOne(mFiles[i], std::cout, [this] { beginPage(); }));
+            endPage();
         }
     }
 
@@ -121,14 +133,15 @@ private:
         std::vector<std::jthread> threads;
         for (std::size_t i = 0; i < mWorkers; ++i)
             threads.emplace_back([this](const std::stop_token& stop) { work(stop); });
-        Progress progress;
-        bool begun = false;
         for (std::size_t i = 0; i < mFiles.size(); ++i) {
-            announce(progress, i);
+            announce(i);
             const Result result = takeResult(i);
-            std::cout << (begun && !result.text.empty() ? mFrame.between : "") << result.text;
-            begun = begun || !result.text.empty();
             mStatus = std::max(mStatus, result.status);
+            if (result.text.empty())
+                continue;
+            beginPage();
+            std::cout << result.text;
+            endPage();
         }
     }
 
@@ -153,8 +166,7 @@ private:
         std::size_t index = 0;
         while (takeFile(stop, index)) {
             std::ostringstream out;
-            bool begun = false;
-            Result result{showOne(mFiles[index], out, "", begun), {}, true};
+            Result result{showOne(mFiles[index], out, [] {}), {}, true};
             result.text = std::move(out).str();
             const std::lock_guard lock(mMutex);
             mResults[index] = std::move(result);
@@ -168,6 +180,9 @@ private:
     Terminal mTerminal;
     std::vector<std::string> mFiles;
     Frame mFrame;
+    bool mOutputIsShown = isTerminal(stdout);
+    Progress mProgress;
+    bool mBegun = false;
     int mStatus = kSuccess;
 
     std::size_t mWorkers = 1;

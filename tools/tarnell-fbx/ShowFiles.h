@@ -18,8 +18,10 @@ namespace tool {
 /// What is printed about one file.
 class Page {
 public:
-    Page(const std::string& file, Form form, const Terminal& terminal, std::ostream& out, std::string_view separator)
-        : mFile(file), mForm(form), mTerminal(terminal), mOut(out), mSeparator(separator) {}
+    /// `beforeBegin` is called before anything is printed.
+    Page(const std::string& file, Form form, const Terminal& terminal, std::ostream& out,
+         std::function<void()> beforeBegin)
+        : mFile(file), mForm(form), mTerminal(terminal), mOut(out), mBeforeBegin(std::move(beforeBegin)) {}
 
     [[nodiscard]] const std::string& file() const { return mFile; }
     [[nodiscard]] Form form() const { return mForm; }
@@ -38,7 +40,7 @@ private:
     Form mForm;
     const Terminal& mTerminal;
     std::ostream& mOut;
-    std::string_view mSeparator;
+    std::function<void()> mBeforeBegin;
     bool mBegun = false;
 };
 
