@@ -116,15 +116,13 @@ struct ChannelSamples {
 std::map<std::string, ChannelSamples> samplesByChannel(const CacheFacts& facts) {
     std::map<std::string, ChannelSamples> channels;
     for (const CacheSampleFacts& sample : facts.samples) {
-        for (const extensions::CacheBlockFacts& block : sample.blocks) {
-            ChannelSamples& channel = channels[block.channel];
-            channel.first = channel.samples == 0 ? sample.frame : channel.first;
-            channel.last = sample.frame;
-            ++channel.samples;
-            channel.leastPoints = std::min(channel.leastPoints, block.count);
-            channel.mostPoints = std::max(channel.mostPoints, block.count);
-            channel.numbers = std::to_string(block.components) + (block.doubles ? " × double" : " × float");
-        }
+        ChannelSamples& channel = channels[facts.channelNames[sample.channel]];
+        channel.first = channel.samples == 0 ? sample.frame : channel.first;
+        channel.last = sample.frame;
+        ++channel.samples;
+        channel.leastPoints = std::min(channel.leastPoints, sample.count);
+        channel.mostPoints = std::max(channel.mostPoints, sample.count);
+        channel.numbers = std::to_string(sample.components) + (sample.doubles ? " × double" : " × float");
     }
     return channels;
 }
@@ -189,11 +187,10 @@ void printSamples(const CacheFacts& facts, std::ostream& out, const Terminal& te
                  {"Offset", Table::Align::right},
                  {"Bytes", Table::Align::right},
                  {"File"}});
-    for (const CacheSampleFacts& sample : facts.samples) {
-        for (const extensions::CacheBlockFacts& block : sample.blocks)
-            table.addRow({numberText(sample.frame), terminalText(block.channel), std::to_string(block.count),
-                          std::to_string(block.offset), std::to_string(block.bytes), terminalText(sample.file)});
-    }
+    for (const CacheSampleFacts& sample : facts.samples)
+        table.addRow({numberText(sample.frame), terminalText(facts.channelNames[sample.channel]),
+                      std::to_string(sample.count), std::to_string(sample.offset), std::to_string(sample.bytes),
+                      terminalText(facts.fileNames[sample.file])});
     table.print(out, terminal, 2);
 }
 
@@ -214,8 +211,8 @@ void printEntry(const CacheEntry& entry, const CacheOptions& options, std::ostre
     if (entry.path.empty())
         return;
     const CacheFacts& facts = entry.facts;
-    out << "  " << kindText(facts) << "\n  " << facts.files << (facts.files == 1 ? " data file, " : " data files, ")
-        << sizeText(facts.bytes) << '\n';
+    out << "  " << kindText(facts) << "\n  " << facts.fileNames.size()
+        << (facts.fileNames.size() == 1 ? " data file, " : " data files, ") << sizeText(facts.bytes) << '\n';
     printChannels(facts, out, terminal);
     if (options.samples)
         printSamples(facts, out, terminal);
@@ -282,18 +279,16 @@ void printSamples(const CacheFacts& facts, bool wanted, JsonWriter& json) {
     }
     json.beginArray();
     for (const CacheSampleFacts& sample : facts.samples) {
-        for (const extensions::CacheBlockFacts& block : sample.blocks) {
-            json.beginObject();
-            json.real("frame", sample.frame);
-            json.text("channel", block.channel);
-            json.integer("points", static_cast<long long>(block.count));
-            json.integer("components", block.components);
-            json.text("numbers", block.doubles ? "double" : "float");
-            json.text("file", sample.file);
-            json.integer("offset", static_cast<long long>(block.offset));
-            json.integer("bytes", static_cast<long long>(block.bytes));
-            json.endObject();
-        }
+        json.beginObject();
+        json.real("frame", sample.frame);
+        json.text("channel", facts.channelNames[sample.channel]);
+        json.integer("points", static_cast<long long>(sample.count));
+        json.integer("components", sample.components);
+        json.text("numbers", sample.doubles ? "double" : "float");
+        json.text("file", facts.fileNames[sample.file]);
+        json.integer("offset", static_cast<long long>(sample.offset));
+        json.integer("bytes", static_cast<long long>(sample.bytes));
+        json.endObject();
     }
     json.endArray();
 }
@@ -326,9 +321,8 @@ void printContent(const CacheFacts& facts, bool withSamples, JsonWriter& json) {
     json.real("framesPerSample", facts.framesPerSample);
     json.real("start", facts.start);
     json.real("end", facts.end);
-    json.integer("files", static_cast<long long>(facts.files));
+    json.integer("files", static_cast<long long>(facts.fileNames.size()));
     json.integer("bytes", static_cast<long long>(facts.bytes));
-    json.integer("sampleCount", static_cast<long long>(facts.samples.size()));
     printChannels(facts, json);
     printSamples(facts, withSamples, json);
     printFaults(facts, json);

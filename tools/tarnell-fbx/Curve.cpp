@@ -215,9 +215,10 @@ void printCurve(const Curves& curves, const LayerCurve& each, std::ostream& out,
     const auto [low, high] = std::minmax_element(
         keys.begin(), keys.end(), [](const KeyFacts& a, const KeyFacts& b) { return a.value < b.value; });
     out << "  " << keys.size() << (keys.size() == 1 ? " key" : " keys") << " on layer "
-        << inQuotes(each.layer->GetName()) << layerRemarks(*each.layer) << ", with values from "
-        << exactText(low->value) << " to " << exactText(high->value) << "; before "
-        << extrapolationText(extrapolationBefore(*each.curve)) << ", after "
+        << inQuotes(each.layer->GetName()) << layerRemarks(*each.layer) << ", values "
+        << (low->value == high->value ? "all " + exactText(low->value)
+                                      : "from " + exactText(low->value) + " to " + exactText(high->value))
+        << "; before " << extrapolationText(extrapolationBefore(*each.curve)) << ", after "
         << extrapolationText(extrapolationAfter(*each.curve)) << '\n';
     Table table({{"Frame", Table::Align::right},
                  {"Seconds", Table::Align::right},

@@ -135,9 +135,11 @@ int props(const PropsOptions& options) {
             return kSuccess;
         }
         std::ostream& out = page.begin();
-        for (std::size_t i = 0; i < objects.size(); ++i) {
-            out << (i == 0 ? "" : "\n");
-            printObject(*objects[i], options, take, out, page.terminal());
+        out << page.terminal().paint(Ink::heading, terminalText(page.file()))
+            << (take ? "  take " + inQuotes(take->GetName()) : "  no take") << '\n';
+        for (const FbxObject* object : objects) {
+            out << '\n';
+            printObject(*object, options, take, out, page.terminal());
         }
         return kSuccess;
     });

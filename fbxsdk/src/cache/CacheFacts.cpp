@@ -8,7 +8,6 @@
 #include <cmath>
 #include <cstdio>
 #include <filesystem>
-#include <map>
 #include <optional>
 #include <system_error>
 
@@ -102,7 +101,7 @@ private:
             fault(name, 0, status.GetErrorString());
             return;
         }
-        ++mFacts.files;
+        mFacts.fileNames.push_back(name);
         mFacts.bytes += file->bytes().size();
         const detail::MayaCacheData data = detail::parseMayaCacheData(file->bytes());
         if (data.end < file->bytes().size())
@@ -111,23 +110,30 @@ private:
             fault(name, 0, "no sample in it");
         for (const detail::MayaCacheFrame& frame : data.frames) {
             const std::int32_t stated = frame.hasTime ? frame.ticks : mDescription.start;
-            addSample(name, file->bytes(), frame, ticks.value_or(stated));
+            addSamples(file->bytes(), frame, ticks.value_or(stated));
             if (ticks) // readers take the first sample of such a file
                 break;
         }
     }
 
-    void addSample(const std::string& file, std::span<const char> bytes, const detail::MayaCacheFrame& frame,
-                   std::int32_t ticks) {
-        CacheSampleFacts sample{frameOf(ticks), file, {}};
+    std::uint32_t channelIndex(std::string_view name) {
+        auto& names = mFacts.channelNames;
+        const auto index = static_cast<std::size_t>(std::find(names.begin(), names.end(), name) - names.begin());
+        if (index == names.size())
+            names.emplace_back(name);
+        return static_cast<std::uint32_t>(index);
+    }
+
+    void addSamples(std::span<const char> bytes, const detail::MayaCacheFrame& frame, std::int32_t ticks) {
+        const auto file = static_cast<std::uint32_t>(mFacts.fileNames.size() - 1);
         for (const detail::MayaCacheBlock& block : frame.blocks) {
             const auto offset = static_cast<std::uint64_t>(block.bytes.data() - bytes.data());
-            sample.blocks.push_back({std::string(block.channel), block.elementCount, block.componentCount,
-                                     block.doubles, offset, block.bytes.size()});
+            mFacts.samples.push_back({frameOf(ticks), file, channelIndex(block.channel), block.elementCount, offset,
+                                      block.bytes.size(), static_cast<std::uint8_t>(block.componentCount),
+                                      block.doubles});
             if (mVerify)
-                checkNumbers(file, offset, block);
+                checkNumbers(mFacts.fileNames.back(), offset, block);
         }
-        mFacts.samples.push_back(std::move(sample));
     }
 
     void checkNumbers(const std::string& file, std::uint64_t offset, const detail::MayaCacheBlock& block) {
@@ -147,15 +153,15 @@ private:
 
     /// All samples of a channel have as many points as its first.
     void checkCounts() {
-        std::map<std::string, std::uint64_t> counts;
+        std::vector<std::optional<std::uint64_t>> counts(mFacts.channelNames.size());
         for (const CacheSampleFacts& sample : mFacts.samples) {
-            for (const CacheBlockFacts& block : sample.blocks) {
-                const auto [known, isFirst] = counts.try_emplace(block.channel, block.count);
-                if (!isFirst && known->second != block.count)
-                    fault(sample.file, block.offset,
-                          "channel " + block.channel + ": " + pointsOf(block.count) + ", its first sample has " +
-                              std::to_string(known->second));
-            }
+            std::optional<std::uint64_t>& first = counts[sample.channel];
+            if (!first)
+                first = sample.count;
+            if (*first != sample.count)
+                fault(mFacts.fileNames[sample.file], sample.offset,
+                      "channel " + mFacts.channelNames[sample.channel] + ": " + pointsOf(sample.count) +
+                          ", its first sample has " + std::to_string(*first));
         }
     }
 
@@ -163,9 +169,7 @@ private:
     void checkTimes(const detail::MayaCacheChannel& channel) {
         std::vector<double> frames;
         for (const CacheSampleFacts& sample : mFacts.samples) {
-            const bool has = std::any_of(sample.blocks.begin(), sample.blocks.end(),
-                                         [&](const CacheBlockFacts& block) { return block.channel == channel.name; });
-            if (has)
+            if (mFacts.channelNames[sample.channel] == channel.name)
                 frames.push_back(sample.frame);
         }
         if (frames.empty()) {
@@ -202,7 +206,8 @@ private:
 void readMaxFacts(const std::string& name, std::span<const char> bytes, bool verify, CacheFacts& facts) {
     constexpr bool kSwap = detail::needsSwap(/*bigEndian=*/false);
     facts.format = FbxCache::eMaxPointCacheV2;
-    facts.files = 1;
+    facts.fileNames = {name};
+    facts.channelNames = {""};
     facts.bytes = bytes.size();
     const auto fault = [&](std::uint64_t offset, const std::string& reason) {
         facts.faults.push_back({name, offset, reason});
@@ -236,10 +241,8 @@ void readMaxFacts(const std::string& name, std::span<const char> bytes, bool ver
     const std::uint64_t complete = std::min(facts.statedSamples, (bytes.size() - kMaxHeaderBytes) / sampleBytes);
     for (std::uint64_t i = 0; i < complete; ++i) {
         const std::uint64_t offset = kMaxHeaderBytes + i * sampleBytes;
-        facts.samples.push_back(
-            {facts.start + static_cast<double>(i) * step,
-             name,
-             {{"", static_cast<std::uint64_t>(points), 3, /*doubles=*/false, offset, sampleBytes}}});
+        facts.samples.push_back({facts.start + static_cast<double>(i) * step, 0, 0, static_cast<std::uint64_t>(points),
+                                 offset, sampleBytes, 3, /*doubles=*/false});
         const auto bad = verify ? firstNotFinite<float>(bytes.subspan(offset, sampleBytes), kSwap) : std::nullopt;
         if (bad)
             fault(offset + *bad, "a number that is not finite");

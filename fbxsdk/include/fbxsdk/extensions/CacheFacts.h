@@ -24,20 +24,16 @@ struct CacheChannelFacts {
     double start = 0.0, end = 0.0;
 };
 
-/// The numbers of one channel in one sample.
-struct CacheBlockFacts {
-    std::string channel;
-    std::uint64_t count = 0; ///< points, or numbers of a channel that has no vectors
-    int components = 3;
-    bool doubles = true;
-    std::uint64_t offset = 0, bytes = 0; ///< of the numbers, in the sample's file
-};
-
+/// The numbers of one channel at one time. Small: there may be as many as a file has bytes for.
 struct CacheSampleFacts {
     /// At the rate of the cache; of a Max cache at that of the scene, of a data file without description at 24.
     double frame = 0.0;
-    std::string file;
-    std::vector<CacheBlockFacts> blocks; ///< one without a name for a Max cache
+    std::uint32_t file = 0;              ///< index into CacheFacts::fileNames
+    std::uint32_t channel = 0;           ///< index into CacheFacts::channelNames
+    std::uint64_t count = 0;             ///< points, or numbers of a channel that has no vectors
+    std::uint64_t offset = 0, bytes = 0; ///< of the numbers, in the file
+    std::uint8_t components = 3;
+    bool doubles = true;
 };
 
 struct CacheFaultFacts {
@@ -53,10 +49,11 @@ struct CacheFacts {
     bool wide = false;       ///< 64-bit chunks (.mcx)
     double frameRate = 0.0;  ///< frames per second; 0: the cache does not say
     double start = 0.0, end = 0.0;
-    double framesPerSample = 1.0;    ///< as a Max cache has it
-    std::uint64_t statedSamples = 0; ///< by a Max cache's header
-    std::uint64_t bytes = 0;         ///< of all data files
-    std::uint64_t files = 0;         ///< data files
+    double framesPerSample = 1.0;          ///< as a Max cache has it
+    std::uint64_t statedSamples = 0;       ///< by a Max cache's header
+    std::uint64_t bytes = 0;               ///< of all data files
+    std::vector<std::string> fileNames;    ///< of the data files that there are
+    std::vector<std::string> channelNames; ///< that samples have; one without letters for a Max cache
     std::vector<CacheChannelFacts> channels;
     std::vector<CacheSampleFacts> samples; ///< by time
     std::vector<CacheFaultFacts> faults;
