@@ -106,6 +106,7 @@ void writeSynopsis(const CommandFacts& command, std::ostream& out) {
 
 std::vector<std::string> namesOf(const std::vector<CommandFacts>& commands) {
     std::vector<std::string> names;
+    names.reserve(commands.size() + 1);
     for (const CommandFacts& command : commands)
         names.push_back(command.name);
     names.emplace_back("help");
