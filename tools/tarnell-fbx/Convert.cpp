@@ -366,8 +366,9 @@ int convert(const ConvertOptions& options) {
             std::cerr << "tarnell-fbx: " << options.input << ": " << loss << '\n';
         for (const std::string& warning : lastWarnings())
             printError(options.output, warning);
+        const bool lossless = conversion.losses().empty() && lastWarnings().empty();
         if (written)
-            return options.strict && !conversion.losses().empty() ? kLosses : kSuccess;
+            return options.strict && !lossless ? kLosses : kSuccess;
         printError(options.output, lastError());
         return kUnreadable;
     });
