@@ -94,6 +94,12 @@ def check_tool(prefix):
     tool = os.path.join(prefix, "bin", "tarnell-fbx")
     if os.path.exists(tool) and CAMERA not in run(tool, "info", SHOT):
         sys.exit("the installed tool does not read")
+    shells = ("man/man1/tarnell-fbx.1", "bash-completion/completions/tarnell-fbx", "zsh/site-functions/_tarnell-fbx",
+              "fish/vendor_completions.d/tarnell-fbx.fish")
+    for file in shells if os.path.exists(tool) else ():
+        path = os.path.join(prefix, "share", file)
+        if not os.path.exists(path) or "records" not in open(path, encoding="utf-8").read():
+            sys.exit(f"not installed, or empty: {path}")
 
 
 with tempfile.TemporaryDirectory() as work:
