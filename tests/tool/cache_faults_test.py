@@ -88,7 +88,8 @@ class Faults(unittest.TestCase):
         self.assertIn("No such file", found[0][2])
 
     def test_a_data_file_leads_to_its_description(self):
-        for data, description in (("wide.mcx", "wide.xml"), ("narrow.mc", "narrow.xml"), ("filesFrame2.mc", "files.xml")):
+        for data, description in (("wide.mcx", "wide.xml"), ("narrow.mc", "narrow.xml"),
+                                  ("filesFrame2.mc", "files.xml")):
             content = self.content(data, "--verify", status=0)
             self.assertEqual(content["description"], self.path(description))
             os.remove(self.path(description))

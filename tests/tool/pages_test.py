@@ -3,7 +3,8 @@
 #
 # Whole pages of the commands that look into files, as they are printed where nobody sees colours. Each file of
 # tests/data/tool/pages is a transcript: a command behind "$ ", then what it prints on standard output, then behind "! "
-# what on standard error, then its exit status where that is not 0. With --update the transcripts are written anew; read the difference before you keep it.
+# what on standard error, then its exit status where that is not 0. With --update the transcripts are written anew; read
+# the difference before you keep it.
 import glob
 import os
 import shlex

@@ -57,10 +57,14 @@ class Schemas(unittest.TestCase):
         self.check("cache", documents("cache", "--samples", "--verify", *FILES, *CACHES))
 
     def test_of_props_and_curves(self):
-        for file, name in ((SHOT, "shotCam"), (SHOT, "crate"), (os.path.join(ROOT, "tests/data/sdk/curves_7400_ascii.fbx"),
-                                                               "node")):
-            self.check("props", documents("props", "--all", file, name))
-            self.check("curve", documents("curve", file, name, "--frames", "0:3"))
+        data = os.path.join(ROOT, "tests", "data", "sdk")
+        for file, name in ((SHOT, "shotCam"), (SHOT, "crate"), (os.path.join(data, "curves_7400_ascii.fbx"), "cubic"),
+                           (os.path.join(data, "auto_curves_7400_ascii.fbx"), "tcb"),
+                           (os.path.join(data, "extrapolation_7400_ascii.fbx"), "other")):
+            pages = documents("props", "--all", file, name) + documents("curve", file, name, "--frames", "0:3")
+            self.assertNotIn("error", [*pages[0], *pages[1]])
+            self.check("props", pages[:1])
+            self.check("curve", pages[1:])
 
     def test_of_a_file_that_cannot_be_read(self):
         with tempfile.TemporaryDirectory() as folder:
