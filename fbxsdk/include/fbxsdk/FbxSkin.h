@@ -7,6 +7,7 @@
 #include <vector>
 
 #include <fbxsdk/FbxDeformer.h>
+#include <fbxsdk/FbxPlainArray.h>
 
 FBXSDK_NAMESPACE_BEGIN
 
@@ -41,6 +42,13 @@ public:
     void SetDeformAccuracy(double pDeformAccuracy) { mDeformAccuracy = pDeformAccuracy; }
     [[nodiscard]] double GetDeformAccuracy() const { return mDeformAccuracy; }
 
+    // Of eBlend: how much of the dual quaternions a point takes, 0 for all linear; nothing is said of other points.
+    void AddControlPointIndex(int pIndex, double pBlendWeight = 0);
+    [[nodiscard]] int GetControlPointIndicesCount() const { return mIndices.count(); }
+    // As many as the count says; null when there are none. The indices are not checked against the geometry.
+    [[nodiscard]] int* GetControlPointIndices() const;
+    [[nodiscard]] double* GetControlPointBlendWeights() const;
+
 protected:
     void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
@@ -48,6 +56,8 @@ private:
     std::vector<FbxCluster*> mClusters;
     EType mSkinningType = eRigid;
     double mDeformAccuracy = 50.0;
+    mutable detail::PlainArray<int> mIndices;
+    mutable detail::PlainArray<double> mBlendWeights;
 };
 
 FBXSDK_NAMESPACE_END

@@ -65,6 +65,16 @@ void readSkin(FbxSkin& skin, const Record& body) {
     if (const auto type = findSpelling(kSkinningTypes, body.childValue("SkinningType").toText()))
         skin.SetSkinningType(*type);
     skin.SetDeformAccuracy(body.childValue("Link_DeformAcuracy").toReal(skin.GetDeformAccuracy()));
+    const Record* indexRecord = body.child("Indexes");
+    const Record* weightRecord = body.child("BlendWeights");
+    if (!indexRecord || !weightRecord)
+        return;
+    PlainArray<int> indices;
+    PlainArray<double> weights;
+    readItems(*indexRecord, indices);
+    readItems(*weightRecord, weights);
+    for (int i = 0; i < std::min(indices.count(), weights.count()); ++i)
+        skin.AddControlPointIndex(indices[i], weights[i]);
 }
 
 void readCluster(FbxCluster& cluster, const Record& body) {

@@ -33,6 +33,17 @@ FbxGeometry* FbxSkin::GetGeometry() { return GetDstObject<FbxGeometry>(); }
 
 bool FbxSkin::SetGeometry(FbxGeometry* pGeometry) { return detail::moveToDestination(*this, pGeometry); }
 
+void FbxSkin::AddControlPointIndex(int pIndex, double pBlendWeight) {
+    mIndices.add(pIndex);
+    mBlendWeights.add(pBlendWeight);
+}
+
+int* FbxSkin::GetControlPointIndices() const { return mIndices.count() == 0 ? nullptr : mIndices.data(); }
+
+double* FbxSkin::GetControlPointBlendWeights() const {
+    return mBlendWeights.count() == 0 ? nullptr : mBlendWeights.data();
+}
+
 void FbxSkin::connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) {
     FbxDeformer::connectionChanged(pSource, pDestination, pConnected);
     if (&pDestination == this)

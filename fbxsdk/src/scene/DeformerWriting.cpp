@@ -36,6 +36,10 @@ void writeSkin(const FbxSkin& skin, const VersionTraits& traits, RecordSink& sin
     writeReal(sink, "Link_DeformAcuracy", skin.GetDeformAccuracy());
     if (traits.idsAndTemplates)
         writeText(sink, "SkinningType", skinningName(skin.GetSkinningType()));
+    if (const auto count = static_cast<std::size_t>(skin.GetControlPointIndicesCount())) {
+        writeArray<std::int32_t>(sink, "Indexes", {skin.GetControlPointIndices(), count});
+        writeArray<double>(sink, "BlendWeights", {skin.GetControlPointBlendWeights(), count});
+    }
 }
 
 void writeMatrix(RecordSink& sink, std::string_view name, const FbxAMatrix& matrix) {

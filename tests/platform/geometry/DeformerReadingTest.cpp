@@ -55,6 +55,16 @@ TEST_F(DeformerReading, ReadsTheKindOfSkinning) {
     EXPECT_EQ(readDeformer<FbxSkin>("")->GetDeformAccuracy(), 50);
 }
 
+TEST_F(DeformerReading, ReadsHowMuchOfTheDualQuaternionsPointsTake) {
+    const auto* skin = readDeformer<FbxSkin>("SkinningType: \"Blend\"\nIndexes: *3 { a: 3,0,1 }\n"
+                                             "BlendWeights: *2 { a: 0.25,1 }");
+    ASSERT_EQ(skin->GetControlPointIndicesCount(), 2);
+    EXPECT_EQ(skin->GetControlPointIndices()[0], 3);
+    EXPECT_EQ(skin->GetControlPointBlendWeights()[0], 0.25);
+    EXPECT_EQ(skin->GetControlPointBlendWeights()[1], 1.0);
+    EXPECT_EQ(readDeformer<FbxSkin>("")->GetControlPointBlendWeights(), nullptr);
+}
+
 TEST_F(DeformerReading, ReadsIndicesAndWeights) {
     const auto* cluster = readDeformer<FbxCluster>("Indexes: *2 { a: 3,0 }\nWeights: *2 { a: 0.5,1 }");
 
