@@ -4,9 +4,9 @@
 // The time that a scene's animation covers: that of its keys, or, without any, that of its Maya point caches.
 #include "FbxSdk.h"
 
-#include "NodeWalk.h"
 #include "PointCacheScope.h"
 #include "PropertySampling.h"
+#include "access/NodeWalk.h"
 #include "calls/LastError.h"
 
 #include <algorithm>

@@ -5,74 +5,14 @@
 // then answers corner by corner without allocating.
 #pragma once
 
+#include "access/LayerValues.h"
+
 #include <fbxsdk.h>
 
 #include <optional>
 #include <vector>
 
 namespace Tarnell::Fbx::detail {
-
-/// One vertex of one polygon.
-struct Corner {
-    int polygon;
-    int polygonVertex; // in the mesh
-    int controlPoint;  // −1 or any number in a damaged file
-};
-
-struct Colour {
-    float red, green, blue, alpha;
-};
-
-/// The values of a layer element by index, as its reference mode has it. They are asked for one by one: values that
-/// still stand in a file need not be in memory all at once for that.
-template <class Value>
-class ElementValues {
-public:
-    /// Nothing is found.
-    ElementValues() = default;
-
-    /// Throws std::runtime_error when the element has no direct array.
-    explicit ElementValues(const fbxsdk::FbxLayerElementTemplate<Value>& element) {
-        switch (element.GetReferenceMode()) {
-        case fbxsdk::FbxLayerElement::eDirect:
-            mDirect = &element.GetDirectArray();
-            break;
-        case fbxsdk::FbxLayerElement::eIndexToDirect:
-            mDirect = &element.GetDirectArray();
-            mIndex = &element.GetIndexArray();
-            break;
-        default: // an index alone leads nowhere
-            break;
-        }
-    }
-
-    /// Values that are numbered all the same where the element has indices only.
-    static ElementValues numbered(const fbxsdk::FbxLayerElementTemplate<Value>& element) {
-        ElementValues values;
-        values.mDirect = &element.GetDirectArray();
-        if (element.GetReferenceMode() != fbxsdk::FbxLayerElement::eDirect) {
-            values.mIndex = &element.GetIndexArray();
-        }
-        return values;
-    }
-
-    std::optional<Value> at(int position) const {
-        if (mIndex != nullptr) {
-            if (position < 0 || position >= mIndex->GetCount()) {
-                return std::nullopt;
-            }
-            position = mIndex->GetAt(position);
-        }
-        if (mDirect == nullptr || position < 0 || position >= mDirect->GetCount()) {
-            return std::nullopt;
-        }
-        return mDirect->GetAt(position);
-    }
-
-private:
-    const fbxsdk::FbxLayerElementArrayTemplate<Value>* mDirect = nullptr;
-    const fbxsdk::FbxLayerElementArrayTemplate<int>* mIndex = nullptr;
-};
 
 /// The values of an element that is mapped by control point or by polygon vertex; nothing of any other.
 template <class Value>

@@ -5,6 +5,7 @@
 #include "FbxSdk.h"
 
 #include "PropertySampling.h"
+#include "access/AttributeEnums.h"
 #include "calls/LastError.h"
 
 namespace Tarnell::Fbx {
@@ -20,48 +21,6 @@ namespace {
 
 using Light = fbxsdk::FbxLight;
 using Marker = fbxsdk::FbxMarker;
-
-/// A number of FBX and what it is called here. What a table does not hold has the value that stands beside it.
-template <class Value>
-struct EnumRow {
-    int fbx;
-    Value value;
-};
-
-template <class Value, std::size_t kCount>
-constexpr Value lookUp(const EnumRow<Value> (&rows)[kCount], int number, Value otherwise) {
-    for (const EnumRow<Value>& row : rows) {
-        if (row.fbx == number) {
-            return row.value;
-        }
-    }
-    return otherwise;
-}
-
-constexpr EnumRow<TnFbxLight::EFbxLightType> kLightTypes[] = {
-    {Light::eDirectional, TnFbxLight::kFbxLightDirectional},
-    {Light::eSpot, TnFbxLight::kFbxLightSpot},
-};
-constexpr auto kOtherLightType = TnFbxLight::kFbxLightPoint; // kept: area and volume lights too
-
-constexpr EnumRow<TnFbxLight::EFbxLightDecayType> kDecayTypes[] = {
-    {Light::eLinear, TnFbxLight::kFbxLightDecayLinear},
-    {Light::eQuadratic, TnFbxLight::kFbxLightDecayQuadratic},
-    {Light::eCubic, TnFbxLight::kFbxLightDecayCubic},
-};
-constexpr auto kOtherDecayType = TnFbxLight::kFbxLightDecayNone;
-
-constexpr EnumRow<TnFbxMarker::EFbxMarkerLookType> kMarkerLooks[] = {
-    {Marker::eHardCross, TnFbxMarker::kFbxMarkerLookHardCross},
-    {Marker::eLightCross, TnFbxMarker::kFbxMarkerLookLightCross},
-    {Marker::eSphere, TnFbxMarker::kFbxMarkerLookSphere},
-};
-constexpr auto kOtherMarkerLook = TnFbxMarker::kFbxMarkerLookCube; // kept: capsules, boxes and the rest too
-
-constexpr EnumRow<TnFbxNull::EFbxNullLookType> kNullLooks[] = {
-    {fbxsdk::FbxNull::eNone, TnFbxNull::kFbxNullLookNone},
-};
-constexpr auto kOtherNullLook = TnFbxNull::kFbxNullLookCross;
 
 /// The colour channels, from red on: three from the property, and an alpha that no property holds.
 template <class Object, class Channel>
@@ -103,8 +62,8 @@ bool FbxSdk::getLight(TnFbxTime& time, bool global, bool useSampleFPS, float sam
     readColour(properties, light, TnFbxLight::kFbxLightRed, source->Color);
     readIntensity(properties, light, *source);
     properties.readInto(light, TnFbxLight::kFbxLightConeAngle, source->OuterAngle);
-    light.setLightType(lookUp(kLightTypes, enumNumber(source->LightType), kOtherLightType));
-    light.setDecayType(lookUp(kDecayTypes, enumNumber(source->DecayType), kOtherDecayType));
+    light.setLightType(detail::lookUp(detail::kLightTypes, enumNumber(source->LightType), detail::kOtherLightType));
+    light.setDecayType(detail::lookUp(detail::kDecayTypes, enumNumber(source->DecayType), detail::kOtherDecayType));
     return succeed();
 }
 
@@ -121,7 +80,7 @@ bool FbxSdk::getMarker(TnFbxTime& time, bool global, bool useSampleFPS, float sa
     PropertySampler properties = sampler(time, useSampleFPS, sampleFPS);
     readColour(properties, marker, TnFbxMarker::kFbxMarkerRed, source->Color);
     marker.setMarkerSize(toFloat(source->Size.Get()));
-    marker.setMarkerLookType(lookUp(kMarkerLooks, enumNumber(source->Look), kOtherMarkerLook));
+    marker.setMarkerLookType(detail::lookUp(detail::kMarkerLooks, enumNumber(source->Look), detail::kOtherMarkerLook));
     return succeed();
 }
 
@@ -145,7 +104,7 @@ bool FbxSdk::getNull(TnFbxTime& time, bool global, bool useSampleFPS, float samp
         return succeed();
     }
     null.setNullSize(toFloat(source->Size.Get()));
-    null.setNullLookType(lookUp(kNullLooks, enumNumber(source->Look), kOtherNullLook));
+    null.setNullLookType(detail::lookUp(detail::kNullLooks, enumNumber(source->Look), detail::kOtherNullLook));
     return succeed();
 }
 

@@ -8,10 +8,10 @@
 
 #include "FileWarnings.h"
 #include "NodeGeometry.h"
-#include "NodeWalk.h"
 #include "PointCacheScope.h"
 #include "SampleRange.h"
 #include "TimeModeScope.h"
+#include "access/NodeWalk.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 

@@ -7,10 +7,11 @@
 
 #include "FileWarnings.h"
 #include "FrameTimes.h"
-#include "NodeWalk.h"
 #include "PropertySampling.h"
 #include "SampleRange.h"
 #include "TimeModeScope.h"
+#include "access/NodeWalk.h"
+#include "access/Normalisation.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 #include "model/FrameArithmetic.h"
@@ -44,11 +45,6 @@ constexpr const char* kImportSettings[] = {
     "Import|AdvOptGrp|FileFormat|Fbx|Global_Settings", //
 };
 
-fbxsdk::FbxAxisSystem targetAxisSystem() {
-    using System = fbxsdk::FbxAxisSystem;
-    return System(System::eYAxis, System::eParityOdd, System::eRightHanded);
-}
-
 /// kept: the settings go to neither the importer nor the manager, so a read always runs with the platform's own
 /// defaults.
 void createImportSettings(fbxsdk::FbxManager* manager) {
@@ -58,37 +54,10 @@ void createImportSettings(fbxsdk::FbxManager* manager) {
     }
 }
 
-void convertToCentimetres(fbxsdk::FbxScene& scene) {
-    const double difference = scene.GetGlobalSettings().GetSystemUnit().GetScaleFactor() - 1.0;
-    if (difference < 0.0 || difference > 0.0) { // a unit that is no number is left alone
-        const fbxsdk::FbxSystemUnit centimetre(/*pScaleFactor*/ 1.0, /*pMultiplier*/ 1.0);
-        centimetre.ConvertScene(&scene, fbxsdk::FbxSystemUnit::DefaultConversionOptions);
-    }
-}
-
-void convertToYUp(fbxsdk::FbxScene& scene) {
-    const fbxsdk::FbxAxisSystem target = targetAxisSystem();
-    if (scene.GetGlobalSettings().GetAxisSystem() != target) {
-        target.ConvertScene(&scene);
-    }
-}
-
 fbxsdk::FbxCriteria isStack() { return fbxsdk::FbxCriteria::ObjectType(fbxsdk::FbxAnimStack::ClassId); }
 
 fbxsdk::FbxAnimStack* stackAt(fbxsdk::FbxScene& scene, int index) {
     return fbxsdk::FbxCast<fbxsdk::FbxAnimStack>(scene.GetSrcObject(isStack(), index));
-}
-
-void triangulate(fbxsdk::FbxManager* manager, fbxsdk::FbxNode& node) {
-    fbxsdk::FbxNodeAttribute* attribute = node.GetNodeAttribute();
-    if (attribute == nullptr) {
-        return;
-    }
-    const auto type = attribute->GetAttributeType();
-    if (type == fbxsdk::FbxNodeAttribute::eNurbs || type == fbxsdk::FbxNodeAttribute::ePatch) {
-        fbxsdk::FbxGeometryConverter converter(manager);
-        converter.Triangulate(attribute, /*pReplace*/ true, /*pLegacy*/ false);
-    }
 }
 
 /// How many samples a list read from the file may hold.
@@ -199,8 +168,8 @@ bool FbxSdk::loadScene(const std::string& fileName, bool convertGeometry) {
     if (!loadScene(mManager, mScene, fileName)) {
         return false;
     }
-    convertToCentimetres(*mScene);
-    convertToYUp(*mScene);
+    detail::convertToCentimetres(*mScene);
+    detail::convertToYUp(*mScene);
     if (convertGeometry) {
         convertNurbsAndPatchRecursive(mManager, mScene->GetRootNode());
     }
@@ -216,7 +185,7 @@ bool FbxSdk::convertNurbsAndPatch(fbxsdk::FbxManager* manager, fbxsdk::FbxScene*
 
 bool FbxSdk::convertNurbsAndPatchRecursive(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* node) {
     return detail::walkNodes(node, [manager](fbxsdk::FbxNode& visited) {
-        triangulate(manager, visited);
+        detail::triangulate(manager, visited);
         return true;
     });
 }

@@ -7,6 +7,7 @@
 
 #include "NodeGeometry.h"
 #include "PropertySampling.h"
+#include "access/RotationOrders.h"
 #include "calls/LastError.h"
 
 #include <array>
@@ -20,27 +21,6 @@ using detail::succeed;
 using detail::toFloat;
 
 namespace {
-
-using RotationOrder = TnFbxTransform::EFbxTransformRotationOrder;
-using Euler = fbxsdk::FbxEuler;
-
-/// One table for both directions; where an order of the library stands twice, its first row is the way back.
-struct OrderRow {
-    Euler::EOrder fbx;
-    RotationOrder library;
-};
-constexpr OrderRow kRotationOrders[] = {
-    {Euler::eOrderXYZ, TnFbxTransform::kFbxRotationOrderXYZ},
-    {Euler::eOrderXZY, TnFbxTransform::kFbxRotationOrderXZY},
-    {Euler::eOrderYZX, TnFbxTransform::kFbxRotationOrderYZX},
-    {Euler::eOrderYXZ, TnFbxTransform::kFbxRotationOrderYXZ},
-    {Euler::eOrderZXY, TnFbxTransform::kFbxRotationOrderZXY},
-    {Euler::eOrderZYX, TnFbxTransform::kFbxRotationOrderZYX},
-    {Euler::eOrderSphericXYZ, TnFbxTransform::kFbxRotationOrderXYZ},
-};
-
-// kept: what is no order reads as ZXY, not as the first
-constexpr OrderRow kFallbackOrder = {Euler::eOrderZXY, TnFbxTransform::kFbxRotationOrderZXY};
 
 /// The local channels and the properties they come from.
 struct LocalRow {
@@ -198,21 +178,11 @@ bool FbxSdk::extractMatrixRotation(fbxsdk::FbxAMatrix matrix, float& x, float& y
 }
 
 TnFbxTransform::EFbxTransformRotationOrder FbxSdk::getRotationOrderConstant(fbxsdk::FbxEuler::EOrder order) {
-    for (const OrderRow& row : kRotationOrders) {
-        if (row.fbx == order) {
-            return row.library;
-        }
-    }
-    return kFallbackOrder.library;
+    return detail::rotationOrderOf(order);
 }
 
 fbxsdk::FbxEuler::EOrder FbxSdk::getRotationOrderConstant(TnFbxTransform::EFbxTransformRotationOrder order) {
-    for (const OrderRow& row : kRotationOrders) {
-        if (row.library == order) {
-            return row.fbx;
-        }
-    }
-    return kFallbackOrder.fbx;
+    return detail::rotationOrderOf(order);
 }
 
 bool FbxSdk::getGeometricTransformation(fbxsdk::FbxNode* node, fbxsdk::FbxVector4& translation,
