@@ -54,8 +54,10 @@ public:
     //
     // `*objects` receives an array of `count` objects, parents before their children; null when `count` is 0, which is
     // a success. The caller owns it and releases it with `delete[]`, also after a failure.
-    // False when `objects` is null (`count` is untouched then), when `info` names no animation stack or no file, and
-    // when the file cannot be read. The first stack of the file is read, whatever the name.
+    // With `kFbxFidelityFaithful` in `info` the values are those of docs/faithful.md, and what is said below of
+    // producer cameras, surfaces and the first stack does not hold. False when `objects` is null (`count` is untouched
+    // then), when `info` names no animation stack or no file, and when the file cannot be read. The first stack of the
+    // file is read, whatever the name.
 
     bool getMeshes(TnFbxReadInfo& info, TnFbxMesh** objects, int& count) const;
     /// The seven producer cameras come first; a file that has none gets them.

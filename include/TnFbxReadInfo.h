@@ -5,6 +5,7 @@
 #pragma once
 
 #include "TnFbxExport.h"
+#include "TnFbxFidelity.h"
 
 #include <string>
 
@@ -63,6 +64,10 @@ public:
     bool setObjectID(int objectID);
     int getObjectID() const; ///< Kept for the host; the library does not read it. Default −1.
 
+    /// Faithful: the stack of the name, an empty one meaning the first; every channel complete or a failure.
+    bool setFidelity(EFbxFidelity fidelity);
+    EFbxFidelity getFidelity() const; ///< What the values stand for; see docs/faithful.md. Default compatible.
+
 private:
     struct Options {
         std::string fileName;
@@ -76,6 +81,7 @@ private:
         bool allObjects = true;
         std::string objectName;
         int objectID = -1;
+        EFbxFidelity fidelity = kFbxFidelityCompatible;
     };
 
     Options mOptions;

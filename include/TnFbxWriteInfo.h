@@ -5,6 +5,7 @@
 #pragma once
 
 #include "TnFbxExport.h"
+#include "TnFbxFidelity.h"
 
 #include <string>
 
@@ -81,6 +82,9 @@ public:
     bool setCompatibilityVersion(eCompatibilityVersion compatibilityVersion);
     eCompatibilityVersion getCompatibilityVersion() const; ///< Default `kFbxVersion2016`.
 
+    bool setFidelity(EFbxFidelity fidelity);
+    EFbxFidelity getFidelity() const; ///< Kept for the host; writing does not look at it yet. Default compatible.
+
 private:
     struct Options {
         std::string fileName;
@@ -96,6 +100,7 @@ private:
         float framesPerSecond = kDefaultFPS;
         float startFrame = kDefaultStartFrame;
         float endFrame = kDefaultEndFrame;
+        EFbxFidelity fidelity = kFbxFidelityCompatible;
     };
 
     Options mOptions;

@@ -51,6 +51,17 @@ bool MeshArrays::allocate(int polygons, int controlPoints, int polygonVertices) 
     return true;
 }
 
+void MeshArrays::allocatePoints(int controlPoints) {
+    mMesh.initMesh();
+    if (controlPoints > 0) {
+        TnFbxMesh::Geometry& g = mMesh.mGeometry;
+        filled(g.controlPoints, static_cast<std::size_t>(controlPoints),
+               {TnFbxMesh::kDefaultMeshPX, TnFbxMesh::kDefaultMeshPY, TnFbxMesh::kDefaultMeshPZ});
+        g.controlPointCount = controlPoints;
+        g.controlPointSetCount = 1;
+    }
+}
+
 std::size_t MeshArrays::polygonVertexCount() const { return mMesh.mGeometry.pointIndices.size(); }
 
 void MeshArrays::completeWithDefaults() {

@@ -23,6 +23,8 @@ public:
     /// To be called first; the mesh is initialised. False when a number is below 1; the mesh is empty then and no array
     /// may be asked for.
     bool allocate(int polygons, int controlPoints, int polygonVertices);
+    /// Instead: points that no polygon uses.
+    void allocatePoints(int controlPoints);
 
     // Each holds as many elements as it has to, defaults at first.
     int* polygonVertexSizes() { return mMesh.mGeometry.polygonVertexSizes.data(); }

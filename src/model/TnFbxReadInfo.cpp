@@ -104,4 +104,11 @@ bool TnFbxReadInfo::setObjectID(int objectID) {
 
 int TnFbxReadInfo::getObjectID() const { return mOptions.objectID; }
 
+bool TnFbxReadInfo::setFidelity(EFbxFidelity fidelity) {
+    mOptions.fidelity = fidelity;
+    return true;
+}
+
+EFbxFidelity TnFbxReadInfo::getFidelity() const { return mOptions.fidelity; }
+
 } // namespace Tarnell::Fbx

@@ -124,4 +124,11 @@ bool TnFbxWriteInfo::setCompatibilityVersion(eCompatibilityVersion compatibility
 
 TnFbxWriteInfo::eCompatibilityVersion TnFbxWriteInfo::getCompatibilityVersion() const { return mCompatibilityVersion; }
 
+bool TnFbxWriteInfo::setFidelity(EFbxFidelity fidelity) {
+    mOptions.fidelity = fidelity;
+    return true;
+}
+
+EFbxFidelity TnFbxWriteInfo::getFidelity() const { return mOptions.fidelity; }
+
 } // namespace Tarnell::Fbx

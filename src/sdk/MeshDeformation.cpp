@@ -6,10 +6,10 @@
 #include "FbxSdk.h"
 
 #include "BlendShapeWeights.h"
-#include "FileWarnings.h"
 #include "PropertySampling.h"
 #include "SkinClusters.h"
-#include "TimeModeScope.h"
+#include "access/FileWarnings.h"
+#include "access/TimeModeScope.h"
 #include "calls/LastError.h"
 
 #include <algorithm>

@@ -9,7 +9,7 @@
 
 #include "FrameTimes.h"
 #include "SampleRange.h"
-#include "TimeModeScope.h"
+#include "access/TimeModeScope.h"
 
 #include "TnFbxTime.h"
 #include "TnFbxTransform.h"

@@ -5,8 +5,8 @@
 // object.
 #include "FbxSdk.h"
 
-#include "TimeModeScope.h"
 #include "WriteChecks.h"
+#include "access/TimeModeScope.h"
 #include "calls/LastError.h"
 #include "model/FrameArithmetic.h"
 

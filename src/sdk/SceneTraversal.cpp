@@ -6,12 +6,12 @@
 // The six kinds of objects differ by a row: which nodes they are, and what reads one. Everything else is one walk.
 #include "FbxSdk.h"
 
-#include "FileWarnings.h"
 #include "NodeGeometry.h"
 #include "PointCacheScope.h"
 #include "SampleRange.h"
-#include "TimeModeScope.h"
+#include "access/FileWarnings.h"
 #include "access/NodeWalk.h"
+#include "access/TimeModeScope.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 

@@ -5,13 +5,13 @@
 // animation stack with the range of frames to read.
 #include "FbxSdk.h"
 
-#include "FileWarnings.h"
 #include "FrameTimes.h"
 #include "PropertySampling.h"
 #include "SampleRange.h"
-#include "TimeModeScope.h"
+#include "access/FileWarnings.h"
 #include "access/NodeWalk.h"
 #include "access/Normalisation.h"
+#include "access/TimeModeScope.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 #include "model/FrameArithmetic.h"

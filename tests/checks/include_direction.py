@@ -21,9 +21,13 @@ PLATFORM = re.compile(
     r'^[<"](?:.*/)?(?:fbxsdk\.h|fbxsdk/.*|(?:core|container|document|scene|animation|geometry|cache)/.*)[>"]$'
 )
 # What belongs to the library: its public headers and its own folders.
-LIBRARY = re.compile(r'^[<"](?:.*/)?(?:Tn\w+\.h|Fbx\.h|FbxSdk\.h|(?:model|sdk)/.*)[>"]$')
+LIBRARY = re.compile(r'^[<"](?:.*/)?(?:Tn\w+\.h|Fbx\.h|FbxSdk\.h|(?:model|access|sdk|faithful)/.*)[>"]$')
 # The layers above the value classes.
-ABOVE_MODEL = re.compile(r'^[<"](?:.*/)?(?:Fbx\.h|FbxSdk\.h|TnFbxError\.h|sdk/.*)[>"]$')
+ABOVE_MODEL = re.compile(r'^[<"](?:.*/)?(?:Fbx\.h|FbxSdk\.h|TnFbxError\.h|(?:access|sdk|faithful)/.*)[>"]$')
+# The two adapters.
+COMPATIBLE = re.compile(r'^[<"](?:.*/)?(?:FbxSdk\.h|sdk/.*)[>"]$')
+FAITHFUL = re.compile(r'^[<"](?:.*/)?faithful/.*[>"]$')
+EITHER = re.compile(r'^[<"](?:.*/)?(?:FbxSdk\.h|(?:sdk|faithful)/.*)[>"]$')
 
 
 class Rule(NamedTuple):
@@ -38,8 +42,11 @@ RULES = (
     Rule(MODEL, PLATFORM, frozenset(), "the value classes know no platform"),
     Rule(("include/TnFbx[!E]*.h", "src/model/*.h", "src/model/*.cpp"), ABOVE_MODEL, frozenset(),
          "the value classes know neither adapter nor facade"),
-    Rule(("include/*.h", "src/sdk/*.h", "src/sdk/*.cpp", "src/*.h", "src/*.cpp"), PLATFORM, frozenset({"<fbxsdk.h>"}),
+    Rule(("include/*.h", "src/*/*.h", "src/*/*.cpp", "src/*.h", "src/*.cpp"), PLATFORM, frozenset({"<fbxsdk.h>"}),
          "the library sees the platform only as <fbxsdk.h>"),
+    Rule(("src/access/*.h", "src/access/*.cpp"), EITHER, frozenset(), "what both adapters need knows neither"),
+    Rule(("src/faithful/*.h", "src/faithful/*.cpp"), COMPATIBLE, frozenset(), "the adapters do not know each other"),
+    Rule(("src/sdk/*.h", "src/sdk/*.cpp"), FAITHFUL, frozenset(), "the adapters do not know each other"),
     Rule(("fbxsdk/**/*.h", "fbxsdk/**/*.cpp"), LIBRARY, frozenset(), "the platform knows nothing of the library"),
 )
 

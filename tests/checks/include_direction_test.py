@@ -33,6 +33,12 @@ class IncludeDirection(unittest.TestCase):
             for include in ("<fbxsdk/FbxTime.h>", '"scene/Node.h"', '"core/Time.h"', '"fbxsdk.h"'):
                 self.assertTrue(self.check(file, f"#include {include}\n"), (file, include))
 
+    def test_refuses_one_adapter_in_the_other_and_both_in_what_they_share(self):
+        for file, include in (("src/sdk/SdkContext.cpp", '"faithful/Scene.h"'), ("src/faithful/Scene.cpp", '"FbxSdk.h"'),
+                              ("src/faithful/Scene.cpp", '"sdk/NodeGeometry.h"'), ("src/access/NodeWalk.h", '"FbxSdk.h"'),
+                              ("src/access/NodeWalk.h", '"faithful/Scene.h"'), ("src/faithful/Scene.h", '"core/Time.h"')):
+            self.assertTrue(self.check(file, f"#include {include}\n"), (file, include))
+
     def test_refuses_the_library_in_the_platform(self):
         for file in ("fbxsdk/src/core/Time.cpp", "fbxsdk/include/fbxsdk/FbxTime.h"):
             for include in ('"TnFbxTime.h"', "<FbxSdk.h>", '"model/FrameArithmetic.h"', '"Fbx.h"'):

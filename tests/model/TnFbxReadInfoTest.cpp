@@ -14,6 +14,8 @@ namespace {
 
 static_assert(TnFbxReadInfo::kDefaultSampleFPS == 24.0f);
 static_assert(TnFbxReadInfo::kDefaultFrame == 0.0f);
+static_assert(kFbxFidelityCompatible == 0);
+static_assert(kFbxFidelityFaithful == 1);
 static_assert(!std::is_polymorphic_v<TnFbxReadInfo>);
 
 void expectDefaults(const TnFbxReadInfo& info) {
@@ -29,6 +31,7 @@ void expectDefaults(const TnFbxReadInfo& info) {
     EXPECT_TRUE(info.getAllObjects());
     EXPECT_EQ(info.getObjectName(), "");
     EXPECT_EQ(info.getObjectID(), -1);
+    EXPECT_EQ(info.getFidelity(), kFbxFidelityCompatible);
 }
 
 /// Options in which every field differs from its default.
@@ -45,6 +48,7 @@ TnFbxReadInfo changedInfo() {
     EXPECT_TRUE(info.setAllObjects(false));
     EXPECT_TRUE(info.setObjectName("camera1"));
     EXPECT_TRUE(info.setObjectID(7));
+    EXPECT_TRUE(info.setFidelity(kFbxFidelityFaithful));
     return info;
 }
 
@@ -61,6 +65,7 @@ void expectChanged(const TnFbxReadInfo& info) {
     EXPECT_FALSE(info.getAllObjects());
     EXPECT_EQ(info.getObjectName(), "camera1");
     EXPECT_EQ(info.getObjectID(), 7);
+    EXPECT_EQ(info.getFidelity(), kFbxFidelityFaithful);
 }
 
 TEST(TnFbxReadInfo, StartsWithItsDefaults) { expectDefaults(TnFbxReadInfo()); }

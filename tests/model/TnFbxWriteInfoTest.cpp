@@ -50,6 +50,7 @@ void expectDefaults(const TnFbxWriteInfo& info) {
     EXPECT_EQ(info.getStartFrame(), 1.0f);
     EXPECT_EQ(info.getEndFrame(), 1.0f);
     EXPECT_EQ(info.getCompatibilityVersion(), 5);
+    EXPECT_EQ(info.getFidelity(), kFbxFidelityCompatible);
 }
 
 /// Options in which every field differs from its default.
@@ -64,6 +65,7 @@ TnFbxWriteInfo changedInfo() {
     EXPECT_TRUE(info.setStartFrame(-2.5f));
     EXPECT_TRUE(info.setEndFrame(99.75f));
     EXPECT_TRUE(info.setCompatibilityVersion(TnFbxWriteInfo::kFbxVersion2012));
+    EXPECT_TRUE(info.setFidelity(kFbxFidelityFaithful));
     return info;
 }
 
@@ -77,6 +79,7 @@ void expectChanged(const TnFbxWriteInfo& info, TnFbxWriteInfo::eCompatibilityVer
     EXPECT_EQ(info.getStartFrame(), -2.5f);
     EXPECT_EQ(info.getEndFrame(), 99.75f);
     EXPECT_EQ(info.getCompatibilityVersion(), version);
+    EXPECT_EQ(info.getFidelity(), kFbxFidelityFaithful);
 }
 
 TEST(TnFbxWriteInfo, StartsWithItsDefaults) { expectDefaults(TnFbxWriteInfo()); }

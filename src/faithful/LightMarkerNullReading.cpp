@@ -1,0 +1,98 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Lights, markers, nulls and plain transforms.
+#include "Placement.h"
+#include "Reading.h"
+#include "Sampling.h"
+
+#include "access/AttributeEnums.h"
+#include "calls/LastError.h"
+
+#include <array>
+#include <string>
+
+namespace Tarnell::Fbx::faithful {
+
+namespace {
+
+using fbxsdk::FbxNode;
+using fbxsdk::FbxTime;
+
+/// Lights of files shine along −Y, those of hosts along −Z.
+fbxsdk::FbxAMatrix lightAxes() {
+    fbxsdk::FbxAMatrix turn;
+    turn.SetR(fbxsdk::FbxVector4(-90.0, 0.0, 0.0));
+    return turn;
+}
+
+Placement lightPlacement(Scene& scene, FbxNode& node, bool global) {
+    Placement placement = placementOf(scene, node, global);
+    placement.matrixAt = [place = placement.matrixAt, turn = lightAxes()](const FbxTime& time) {
+        return place(time) * turn;
+    };
+    placement.ownAngles = false;
+    return placement;
+}
+
+std::array<double, 4> opaque(const fbxsdk::FbxDouble3& colour) { return {colour[0], colour[1], colour[2], 1.0}; }
+
+/// Of what has no channel the value at the frame of the static ones is handed out.
+double sizeAt(const Scene& scene, const FbxNode& node, fbxsdk::FbxPropertyT<fbxsdk::FbxDouble>& property) {
+    const double now = property.EvaluateValue(scene.now());
+    const Timeline& timeline = scene.timeline();
+    if (property.IsAnimated() && (property.EvaluateValue(timeline.at(static_cast<double>(timeline.first()))) != now ||
+                                  property.EvaluateValue(timeline.at(static_cast<double>(timeline.last()))) != now)) {
+        detail::warn(scene.fileName() + ": the size of \"" + node.GetName() +
+                     "\" is animated, and objects hold one size: that of the frame of the static values");
+    }
+    return now;
+}
+
+} // namespace
+
+bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxTransform& transform) {
+    return readPlacement(scene, placementOf(scene, node, info.getGlobalTransform()), transform);
+}
+
+bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxLight& light) {
+    fbxsdk::FbxLight& source = *node.GetLight();
+    light.setLightType(
+        detail::lookUp(detail::kLightTypes, source.LightType.Get<fbxsdk::FbxEnum>(), detail::kOtherLightType));
+    light.setDecayType(
+        detail::lookUp(detail::kDecayTypes, source.DecayType.Get<fbxsdk::FbxEnum>(), detail::kOtherDecayType));
+    const auto valuesAt = [&source](const FbxTime& time) -> std::array<double, 6> {
+        const std::array<double, 4> colour = opaque(source.Color.EvaluateValue(time));
+        return {colour[0],
+                colour[1],
+                colour[2],
+                colour[3],
+                source.Intensity.EvaluateValue(time) / 100.0, // from percent
+                source.OuterAngle.EvaluateValue(time)};
+    };
+    return readPlacement(scene, lightPlacement(scene, node, info.getGlobalTransform()), light) &&
+           fillChannels<6>(scene, scene.isKeyed(source), light, TnFbxLight::kFbxLightRed, valuesAt);
+}
+
+bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMarker& marker) {
+    fbxsdk::FbxMarker& source = *node.GetMarker();
+    marker.setMarkerLookType(
+        detail::lookUp(detail::kMarkerLooks, source.Look.Get<fbxsdk::FbxEnum>(), detail::kOtherMarkerLook));
+    marker.setMarkerSize(toFloat(sizeAt(scene, node, source.Size)));
+    return readNode(scene, info, node, static_cast<TnFbxTransform&>(marker)) &&
+           fillChannels<4>(scene, scene.isKeyed(source), marker, TnFbxMarker::kFbxMarkerRed,
+                           [&source](const FbxTime& time) { return opaque(source.Color.EvaluateValue(time)); });
+}
+
+bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxNull& null) {
+    if (fbxsdk::FbxNull* source = node.GetNull()) {
+        null.setNullLookType(
+            detail::lookUp(detail::kNullLooks, source->Look.Get<fbxsdk::FbxEnum>(), detail::kOtherNullLook));
+        null.setNullSize(toFloat(sizeAt(scene, node, source->Size)));
+    } else {
+        null.setNullLookType(TnFbxNull::kFbxNullLookNone); // a node that carries nothing shows nothing
+    }
+    return readNode(scene, info, node, static_cast<TnFbxTransform&>(null));
+}
+
+} // namespace Tarnell::Fbx::faithful

@@ -1,0 +1,186 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+#include "Placement.h"
+
+#include "Sampling.h"
+#include "access/RotationOrders.h"
+
+#include <algorithm>
+#include <array>
+#include <cmath>
+#include <vector>
+
+namespace Tarnell::Fbx::faithful {
+
+namespace {
+
+using Matrix = fbxsdk::FbxAMatrix;
+using fbxsdk::FbxNode;
+using fbxsdk::FbxTime;
+
+constexpr auto kSource = FbxNode::eSourcePivot;
+
+RotationOrder orderInForce(const FbxNode& node) {
+    fbxsdk::FbxEuler::EOrder order = fbxsdk::FbxEuler::eOrderXYZ;
+    if (node.GetRotationActive()) {
+        node.GetRotationOrder(kSource, order);
+    }
+    return detail::rotationOrderOf(order);
+}
+
+Vector valueAt(fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property, const FbxTime& time) {
+    const fbxsdk::FbxDouble3 value = property.EvaluateValue(time);
+    return {value[0], value[1], value[2]};
+}
+
+constexpr std::size_t kChannels = 12;
+constexpr std::array<TransformChannel, kChannels / 3> kFirstChannels = {
+    TnFbxTransform::kFbxTransformPositionX, TnFbxTransform::kFbxTransformRotationX, TnFbxTransform::kFbxTransformScaleX,
+    TnFbxTransform::kFbxTransformSkewX};
+
+TransformChannel channelAt(std::size_t i) {
+    return static_cast<TransformChannel>(static_cast<int>(kFirstChannels[i / 3]) + static_cast<int>(i % 3));
+}
+
+/// Position, angles, scale and skew, as the channels are filled.
+using Values = std::array<double, kChannels>;
+
+Values valuesOf(const Parts& parts, const Vector& angles) {
+    Values values{};
+    for (std::size_t i = 0; i < 3; ++i) {
+        values[i] = parts.position[i];
+        values[3 + i] = angles[i];
+        values[6 + i] = parts.scale[i];
+        values[9 + i] = parts.skew[i];
+    }
+    return values;
+}
+
+Parts partsAt(const Placement& placement, const FbxTime& time) {
+    return decompose(placement.matrixAt(time), valueAt(placement.node.LclScaling, time));
+}
+
+/// The node's own angles, which say how often it turned, where they are what turns it.
+class OwnAngles {
+public:
+    OwnAngles(const Placement& placement, RotationOrder order)
+        : mNode(placement.node), mOrder(order), mFit(placement.ownAngles) {}
+
+    bool fit() const { return mFit; }
+    Vector at(const FbxTime& time) const { return valueAt(mNode.LclRotation, time); }
+    /// They no longer fit once they do not turn like this.
+    void compare(const Vector& angles, const Matrix& rotation) {
+        mFit = mFit && turnAlike(rotationOf(angles, mOrder), rotation);
+    }
+
+private:
+    FbxNode& mNode;
+    RotationOrder mOrder;
+    bool mFit;
+};
+
+void setStill(TnFbxTransform& object, const Values& values) {
+    for (std::size_t i = 0; i < kChannels; ++i) {
+        object.setTransformValue(channelAt(i), toFloat(values[i]));
+    }
+}
+
+void readStill(Scene& scene, const Placement& placement, RotationOrder order, TnFbxTransform& object) {
+    const Parts parts = partsAt(placement, scene.now());
+    OwnAngles own(placement, order);
+    const Vector hint = own.at(scene.now());
+    own.compare(hint, parts.rotation);
+    const Vector near = placement.ownAngles ? hint : Vector{};
+    setStill(object, valuesOf(parts, own.fit() ? hint : anglesNear(parts.rotation, order, near)));
+}
+
+/// One vector per channel, and the node's own angles as long as they fit.
+struct Samples {
+    std::array<std::vector<float>, kChannels> channels;
+    std::array<std::vector<float>, 3> ownAngles;
+};
+
+bool readMoving(Scene& scene, const Placement& placement, RotationOrder order, TnFbxTransform& object) {
+    if (!scene.grantSamples(kChannels)) {
+        return false;
+    }
+    const Timeline& timeline = scene.timeline();
+    Samples samples;
+    for (std::vector<float>& channel : samples.channels) {
+        channel.reserve(static_cast<std::size_t>(timeline.count()));
+    }
+    OwnAngles own(placement, order);
+    Vector angles = placement.ownAngles ? own.at(timeline.at(static_cast<double>(timeline.first()))) : Vector{};
+    Vector nearNow = angles;
+    for (std::int64_t frame = timeline.first(); frame <= timeline.last(); ++frame) {
+        const FbxTime time = timeline.at(static_cast<double>(frame));
+        const Parts parts = partsAt(placement, time);
+        angles = anglesNear(parts.rotation, order, angles);
+        if (static_cast<double>(frame) <= static_cast<double>(scene.frame())) {
+            nearNow = angles;
+        }
+        const Values values = valuesOf(parts, angles);
+        for (std::size_t i = 0; i < kChannels; ++i) {
+            samples.channels[i].push_back(toFloat(values[i]));
+        }
+        if (own.fit()) {
+            const Vector ownAngles = own.at(time);
+            own.compare(ownAngles, parts.rotation);
+            for (std::size_t i = 0; i < 3; ++i) {
+                samples.ownAngles[i].push_back(toFloat(ownAngles[i]));
+            }
+        }
+    }
+    if (own.fit()) {
+        std::move(samples.ownAngles.begin(), samples.ownAngles.end(), samples.channels.begin() + 3);
+    }
+    const Parts now = partsAt(placement, scene.now());
+    setStill(object, valuesOf(now, own.fit() ? own.at(scene.now()) : anglesNear(now.rotation, order, nearNow)));
+    for (std::size_t i = 0; i < kChannels; ++i) {
+        setSamplesThatDiffer(object, channelAt(i), timeline.record(scene.frame()), std::move(samples.channels[i]));
+    }
+    return true;
+}
+
+} // namespace
+
+Matrix worldMatrix(FbxNode& node, const FbxTime& time) {
+    return node.EvaluateGlobalTransform(time, kSource, /*pApplyTarget*/ false, /*pForceEval*/ false);
+}
+
+Matrix parentMatrix(FbxNode& node, const FbxTime& time) {
+    FbxNode* parent = node.GetParent();
+    return parent != nullptr ? worldMatrix(*parent, time) : Matrix();
+}
+
+Matrix localMatrix(FbxNode& node, const FbxTime& time) {
+    const Matrix parent = parentMatrix(node, time);
+    if (handedness(parent) == 0.0) { // what is flattened cannot be seen from the parent
+        return node.EvaluateLocalTransform(time, kSource, /*pApplyTarget*/ false, /*pForceEval*/ false);
+    }
+    return parent.Inverse() * worldMatrix(node, time);
+}
+
+Matrix geometricMatrix(const FbxNode& node) {
+    Matrix matrix;
+    matrix.SetTRS(node.GetGeometricTranslation(kSource), node.GetGeometricRotation(kSource),
+                  node.GetGeometricScaling(kSource));
+    return matrix;
+}
+
+Placement placementOf(Scene& scene, FbxNode& node, bool global) {
+    const auto matrixAt = global ? worldMatrix : localMatrix;
+    return {node, [&node, matrixAt](const FbxTime& time) { return matrixAt(node, time); }, scene.moves(node), true};
+}
+
+bool readPlacement(Scene& scene, const Placement& placement, TnFbxTransform& object) {
+    const RotationOrder order = orderInForce(placement.node);
+    object.setTransformRotationOrder(order);
+    if (placement.moves) {
+        return readMoving(scene, placement, order, object);
+    }
+    readStill(scene, placement, order, object);
+    return true;
+}
+
+} // namespace Tarnell::Fbx::faithful

@@ -1,0 +1,40 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What the facade calls when a read is to be faithful, and the readers of single nodes.
+#pragma once
+
+#include "Scene.h"
+
+#include "TnFbxCamera.h"
+#include "TnFbxLight.h"
+#include "TnFbxMarker.h"
+#include "TnFbxMesh.h"
+#include "TnFbxNull.h"
+#include "TnFbxReadInfo.h"
+#include "TnFbxTransform.h"
+
+namespace Tarnell::Fbx::faithful {
+
+/// Reads all nodes of a kind, or the first of the name, into an array that the caller owns; null for none. After a
+/// failure, whose reason is noted, there may be one as well.
+template <class Object>
+bool readObjects(const TnFbxReadInfo& info, Object** objects, int& count);
+
+extern template bool readObjects(const TnFbxReadInfo&, TnFbxMesh**, int&);
+extern template bool readObjects(const TnFbxReadInfo&, TnFbxCamera**, int&);
+extern template bool readObjects(const TnFbxReadInfo&, TnFbxLight**, int&);
+extern template bool readObjects(const TnFbxReadInfo&, TnFbxMarker**, int&);
+extern template bool readObjects(const TnFbxReadInfo&, TnFbxNull**, int&);
+extern template bool readObjects(const TnFbxReadInfo&, TnFbxTransform**, int&);
+
+// One node, which must be of the kind, into an object as it was made. False, with the reason noted, when there is no
+// room for what it takes or when it is damaged.
+bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxMesh& mesh);
+bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxCamera& camera);
+bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxLight& light);
+bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxMarker& marker);
+bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxNull& null);
+bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxTransform& transform);
+
+} // namespace Tarnell::Fbx::faithful

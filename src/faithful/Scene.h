@@ -1,0 +1,67 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// One file as one read wants it: loaded, normalised, with the animation stack and the frames that were asked for.
+#pragma once
+
+#include "Timeline.h"
+#include "TnFbxReadInfo.h"
+#include "access/TimeModeScope.h"
+#include "calls/MemoryLimit.h"
+
+#include <fbxsdk.h>
+
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+namespace Tarnell::Fbx::faithful {
+
+class Scene {
+public:
+    Scene() = default;
+    ~Scene();
+    Scene(const Scene&) = delete;
+    Scene& operator=(const Scene&) = delete;
+
+    /// Once. False, with the reason noted, when the file cannot be read or has not what the options name.
+    bool load(const TnFbxReadInfo& info);
+
+    fbxsdk::FbxManager* manager() const { return mManager; }
+    fbxsdk::FbxScene& scene() const { return *mScene; }
+    const std::string& fileName() const { return mFileName; }
+    const Timeline& timeline() const { return mTimeline; }
+    /// The frame of the static values, and its time.
+    float frame() const { return mFrame; }
+    fbxsdk::FbxTime now() const { return mNow; }
+
+    /// Whether anything of the object is keyed in the stack.
+    bool isKeyed(const fbxsdk::FbxObject& object) const;
+    /// Whether the node, or one that it hangs on, is keyed in its transform.
+    bool moves(fbxsdk::FbxNode& node);
+
+    /// Asks for the memory of so many channels with a sample for every frame. False, with the reason noted.
+    bool grantSamples(std::int64_t channels);
+    /// The same for other bytes that are handed out.
+    bool grantBytes(std::uint64_t bytes);
+
+private:
+    bool selectStack(const std::string& name);
+    bool selectFrames(const TnFbxReadInfo& info);
+    fbxsdk::FbxTimeSpan animatedSpan();
+    bool isKeyed(fbxsdk::FbxProperty property) const;
+
+    detail::TimeModeScope mTimeMode;        // an import leaves the file's
+    fbxsdk::FbxManager* mManager = nullptr; // owned
+    fbxsdk::FbxScene* mScene = nullptr;     // the manager's
+    std::string mFileName;
+    fbxsdk::FbxAnimStack* mStack = nullptr; // null: nothing is animated
+    std::vector<fbxsdk::FbxAnimLayer*> mLayers;
+    Timeline mTimeline;
+    float mFrame = 0.0f;
+    fbxsdk::FbxTime mNow;
+    detail::MemoryAccount mMemory;
+    std::unordered_map<const fbxsdk::FbxNode*, bool> mMoves;
+};
+
+} // namespace Tarnell::Fbx::faithful

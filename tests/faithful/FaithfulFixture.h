@@ -1,0 +1,43 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Reads through the facade of what the application shows: of files of the test data, and of scenes that a test builds.
+#pragma once
+
+#include "sdk/FixtureFiles.h"
+#include "support/TemporaryFolder.h"
+
+#include "TnFbxWriteInfo.h"
+
+#include <string>
+
+namespace Tarnell::Fbx::test {
+
+/// In the world, from the first stack.
+inline TnFbxReadInfo faithfulRead(const std::string& fileName) {
+    TnFbxReadInfo info;
+    info.setFileName(fileName);
+    info.setFidelity(kFbxFidelityFaithful);
+    return info;
+}
+
+/// A built scene as a file, which goes with this.
+class SavedScene {
+public:
+    explicit SavedScene(TestScene& scene) : mFile(mFolder.file("scene.fbx")) {
+        EXPECT_TRUE(scene.sdk.saveScene(scene.scene->GetFbxManager(), scene.scene, mFile, /*asciiFormat*/ false,
+                                        TnFbxWriteInfo::kFbxVersion2014, /*embedMedia*/ false));
+    }
+    TnFbxReadInfo info() const { return faithfulRead(mFile); }
+
+private:
+    support::TemporaryFolder mFolder;
+    std::string mFile;
+};
+
+template <class Object>
+FacadeRead<Object> readFaithfully(TestScene& scene) {
+    return FacadeRead<Object>(SavedScene(scene).info());
+}
+
+} // namespace Tarnell::Fbx::test
