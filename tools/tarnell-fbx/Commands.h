@@ -31,6 +31,8 @@ struct DumpOptions {
     std::optional<std::string> name;
     bool samples = true;
     bool pretty = false;
+    bool faithful = false;
+    std::string stack; ///< of faithful values; empty: the first one
 };
 
 enum class PointCache { maya, max, none };

@@ -6,8 +6,11 @@
 #include <functional>
 #include <iostream>
 #include <memory>
+#include <optional>
+#include <type_traits>
 
 #include "Commands.h"
+#include "FileFacts.h"
 #include "JsonWriter.h"
 
 #include "Fbx.h"
@@ -172,7 +175,12 @@ public:
     Dump(const DumpOptions& options, std::ostream& out)
         : mOptions(options), mJson(out, options.pretty), mPrinter(mJson, options.samples) {
         mInfo.setFileName(options.file);
-        mInfo.setAnimationStackName("*"); // any name will do: the first stack is read
+        if (options.faithful) {
+            mInfo.setFidelity(kFbxFidelityFaithful);
+            mInfo.setAnimationStackName(options.stack);
+        } else {
+            mInfo.setAnimationStackName("*"); // any name will do: the first stack is read
+        }
         mInfo.setGlobalTransform(!options.local);
         mInfo.setTransformPoints(options.transformPoints);
         mInfo.setFrame(options.frame);
@@ -185,12 +193,19 @@ public:
             mInfo.setObjectName(*options.name);
     }
 
-    bool load() { return mFbx.loadScene(mOptions.file, mSdk); }
+    /// Empty when the file was read, else why it was not.
+    std::string load() {
+        if (mOptions.faithful)
+            return mFacts.load(mOptions.file);
+        return mFbx.loadScene(mOptions.file, mSdk) ? std::string() : lastError();
+    }
 
     bool print() {
         mJson.beginObject();
         mJson.key("file");
         mJson.text(mOptions.file.substr(mOptions.file.find_last_of('/') + 1));
+        if (mOptions.faithful)
+            printFacts();
         printStacks();
         printRange();
         bool complete = true;
@@ -204,7 +219,10 @@ public:
 
     /// Whether there is anything of the name that was asked for, of the kinds that were.
     bool finds() {
-        const auto isFound = [this](const Kind& kind) { return wanted(kind.name) && count(kind) > 0; };
+        const auto isFound = [this](const Kind& kind) {
+            const bool isThere = mOptions.faithful ? mFacts.has(kind.name, *mOptions.name) : count(kind) > 0;
+            return wanted(kind.name) && isThere;
+        };
         return !mOptions.name || std::any_of(kinds().begin(), kinds().end(), isFound);
     }
 
@@ -222,9 +240,41 @@ private:
         return asked.empty() || std::find(asked.begin(), asked.end(), kind) != asked.end();
     }
 
+    void printFacts() {
+        mJson.key("unitInCentimetres");
+        mJson.real(static_cast<float>(mFacts.unitInCentimetres()));
+        mJson.key("axes");
+        mJson.text(mFacts.axes());
+    }
+
+    /// What stands around the values of an object when they are faithful.
+    template <class Object>
+    void printSurroundings(const Object& object) {
+        const char* const space = mOptions.local ? "parent" : "world";
+        mJson.key("parent");
+        const std::optional<std::string> parent = mFacts.parentOfNext(object.getName());
+        if (parent)
+            mJson.text(*parent);
+        else
+            mJson.null();
+        mJson.key("space");
+        mJson.text(space);
+        if constexpr (std::is_same_v<Object, TnFbxMesh>) {
+            mJson.key("pointSpace");
+            mJson.text(mOptions.transformPoints ? space : "object");
+        }
+        if constexpr (std::is_same_v<Object, TnFbxCamera>) {
+            mJson.key("producer");
+            mJson.boolean(false); // they are not handed out
+        }
+    }
+
     void printStacks() {
         std::vector<std::string> names;
-        mSdk.getAnimationStackNames(names);
+        if (mOptions.faithful)
+            names = mFacts.stackNames();
+        else
+            mSdk.getAnimationStackNames(names);
         mJson.key("stacks");
         mJson.beginArray();
         for (const std::string& name : names)
@@ -234,7 +284,14 @@ private:
 
     void printRange() {
         float start = 0.0F, end = 0.0F;
-        const bool animated = mSdk.getAnimationFrameRange(start, end);
+        bool animated = false;
+        if (!mOptions.faithful) {
+            animated = mSdk.getAnimationFrameRange(start, end);
+        } else if (const auto range = mFacts.keyedRange(mOptions.stack)) {
+            animated = true;
+            start = static_cast<float>(range->first);
+            end = static_cast<float>(range->second);
+        }
         mJson.key("range");
         if (!animated) {
             mJson.null();
@@ -251,26 +308,46 @@ private:
                                        mInfo.getObjectName(), mSdk);
     }
 
+    /// How the objects of a kind are read: through the facade when their values are faithful, else from the scene that
+    /// is loaded.
+    template <class Object>
+    struct Source {
+        bool (Tarnell::Fbx::Fbx::*faithful)(TnFbxReadInfo&, Object**, int&) const;
+        bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int);
+    };
+
     /// Reads all objects of one kind, or the named one, and hands each to `each`.
     template <class Object, class Each>
-    bool read(const Kind& kind, bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int), const Each& each) {
-        const int number = count(kind);
-        if (number < 1)
-            return true;
-        const std::unique_ptr<Object[]> objects(new Object[static_cast<std::size_t>(number)]);
-        const bool complete = (mSdk.*fill)(mInfo, objects.get(), number);
+    bool read(const Kind& kind, const Source<Object>& source, const Each& each) {
+        Object* made = nullptr;
+        int number = 0;
+        bool complete = true;
+        if (mOptions.faithful) {
+            complete = (mFbx.*source.faithful)(mInfo, &made, number);
+            mFacts.beginNodes(kind.name);
+        } else {
+            number = count(kind);
+            if (number < 1)
+                return true;
+            made = new Object[static_cast<std::size_t>(number)];
+        }
+        const std::unique_ptr<Object[]> objects(made);
+        if (!mOptions.faithful)
+            complete = (mSdk.*source.fill)(mInfo, made, number);
         for (int i = 0; i < number; ++i)
             each(objects[static_cast<std::size_t>(i)]);
         return complete;
     }
 
     template <class Object>
-    bool printKind(const Kind& kind, bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int)) {
+    bool printKind(const Kind& kind, const Source<Object>& source) {
         mJson.key(kind.name);
         mJson.beginArray();
-        const bool complete = read<Object>(kind, fill, [&](Object& object) {
+        const bool complete = read<Object>(kind, source, [&](Object& object) {
             mJson.beginObject();
             mPrinter.transform(object);
+            if (mOptions.faithful)
+                printSurroundings(object);
             mPrinter.details(object);
             mJson.endObject();
         });
@@ -288,15 +365,16 @@ private:
         for (long long frame = first; frame <= last; ++frame) {
             const float at = ranged ? static_cast<float>(frame) : mOptions.frame;
             mInfo.setFrame(at);
-            complete = read<TnFbxMesh>(kind, &FbxSdk::getMeshes,
-                                       [&](TnFbxMesh& mesh) {
-                                           mJson.beginObject();
-                                           mPrinter.transform(mesh);
-                                           mPrinter.number("frame", at);
-                                           mPrinter.details(mesh);
-                                           mJson.endObject();
-                                       }) &&
-                       complete;
+            const auto print = [&](TnFbxMesh& mesh) {
+                mJson.beginObject();
+                mPrinter.transform(mesh);
+                if (mOptions.faithful)
+                    printSurroundings(mesh);
+                mPrinter.number("frame", at);
+                mPrinter.details(mesh);
+                mJson.endObject();
+            };
+            complete = read<TnFbxMesh>(kind, {&Tarnell::Fbx::Fbx::getMeshes, &FbxSdk::getMeshes}, print) && complete;
         }
         mInfo.setFrame(mOptions.frame);
         mJson.endArray();
@@ -308,21 +386,33 @@ private:
     ObjectPrinter mPrinter;
     TnFbxReadInfo mInfo;
     Tarnell::Fbx::Fbx mFbx;
-    FbxSdk mSdk;
+    FbxSdk mSdk;      // of compatible values
+    FileFacts mFacts; // of faithful ones
 };
 
 const std::vector<Dump::Kind>& Dump::kinds() {
+    using Facade = Tarnell::Fbx::Fbx;
     static const std::vector<Kind> kKinds = {
         {"cameras", &FbxSdk::getNumberOfCameras, 32,
-         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxCamera>(kind, &FbxSdk::getCameras); }},
+         [](Dump& d, const Kind& kind) {
+             return d.printKind<TnFbxCamera>(kind, {&Facade::getCameras, &FbxSdk::getCameras});
+         }},
         {"lights", &FbxSdk::getNumberOfLights, 64,
-         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxLight>(kind, &FbxSdk::getLights); }},
+         [](Dump& d, const Kind& kind) {
+             return d.printKind<TnFbxLight>(kind, {&Facade::getLights, &FbxSdk::getLights});
+         }},
         {"markers", &FbxSdk::getNumberOfMarkers, 1,
-         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxMarker>(kind, &FbxSdk::getMarkers); }},
+         [](Dump& d, const Kind& kind) {
+             return d.printKind<TnFbxMarker>(kind, {&Facade::getMarkers, &FbxSdk::getMarkers});
+         }},
         {"nulls", &FbxSdk::getNumberOfNulls, 0x4000,
-         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxNull>(kind, &FbxSdk::getNulls); }},
+         [](Dump& d, const Kind& kind) {
+             return d.printKind<TnFbxNull>(kind, {&Facade::getNulls, &FbxSdk::getNulls});
+         }},
         {"transforms", &FbxSdk::getNumberOfTransforms, 0x4005,
-         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxTransform>(kind, &FbxSdk::getTransforms); }},
+         [](Dump& d, const Kind& kind) {
+             return d.printKind<TnFbxTransform>(kind, {&Facade::getTransforms, &FbxSdk::getTransforms});
+         }},
         {"meshes", &FbxSdk::getNumberOfMeshes, 4, [](Dump& d, const Kind& kind) { return d.printMeshes(kind); }},
     };
     return kKinds;
@@ -342,8 +432,9 @@ const std::vector<std::string>& dumpKinds() {
 
 int dump(const DumpOptions& options) {
     Dump dump(options, std::cout);
-    if (!dump.load()) {
-        printError(options.file, lastError());
+    const std::string fault = dump.load();
+    if (!fault.empty()) {
+        printError(options.file, fault);
         return kUnreadable;
     }
     if (!dump.finds()) {

@@ -26,6 +26,7 @@ public:
     void key(std::string_view name);
     void text(std::string_view value);
     void null() { raw("null"); }
+    void boolean(bool value) { raw(value ? "true" : "false"); }
     void integer(long long value) { number(value); }
     /// A number that is spelt already; null for what is no JSON number (NaN and infinities).
     void digits(std::string_view spelling) { raw(spelling.find_first_of("in") == spelling.npos ? spelling : "null"); }

@@ -78,6 +78,9 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
     dump->add_flag_callback(
         "--no-samples", [&options] { options.samples = false; }, "Leave the sample arrays out");
     dump->add_flag("--pretty", options.pretty, "Indented");
+    CLI::Option* faithful =
+        dump->add_flag("--faithful", options.faithful, "What the application shows instead of what hosts rely on");
+    dump->add_option("--stack", options.stack, "The animation stack to read (default: the first one)")->needs(faithful);
 }
 
 void addConvert(CLI::App& app, tool::ConvertOptions& options) {
