@@ -15,7 +15,7 @@ namespace conformance {
 namespace {
 
 /// 3ds Max numbers points anew; other files say of themselves that their order is another one.
-constexpr std::string_view kSignsOfOtherOrder[] = {"3ds Max Wavefront", "bad_order"};
+constexpr std::string_view kSignsOfOtherOrder[] = {"3ds Max Wavefront", "Max2Obj", "bad_order"};
 constexpr std::string_view kTolerance = "tolerance=";
 
 void readComment(std::string_view line, WavefrontFile& file) {

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Meshes against the Wavefront file that the same application saved of the same scene: an independent truth.
-#include "Rows.h"
+#include "FaithfulRows.h"
 #include "Tolerances.h"
 #include "WavefrontFile.h"
 
@@ -130,13 +130,10 @@ struct Pair {
     const std::vector<Point>* wavefront;
 };
 
-/// Frames of a clip that is not the scene's first count from the clip's start.
 FbxTime timeOf(const WavefrontSibling& sibling, const Reference& reference) {
     if (!sibling.frame)
         return FBXSDK_TIME_INFINITE; // the values as stored
-    const double seconds = *sibling.frame / reference.fps;
-    const double start = reference.stacks.empty() ? 0.0 : reference.stacks[0].begin;
-    return timeOfSeconds(seconds < start ? start + seconds : seconds);
+    return timeOfSeconds(secondsOf(sibling, reference));
 }
 
 std::vector<Pair> pairsOf(LoadedFile& file, const WavefrontFile& wavefront, const FbxTime& time, bool deformed) {
@@ -172,12 +169,11 @@ std::vector<std::string> differencesIn(const Space& space, const Reference& refe
 }
 
 /// All meshes of a file stand in one space: the one in which most of them agree.
-void compareSibling(LoadedFile& file, const WavefrontSibling& sibling, bool deformed, Findings& findings) {
-    const WavefrontFile wavefront = readWavefront(sibling.path);
-    const std::vector<Pair> pairs = pairsOf(file, wavefront, timeOf(sibling, file.reference()), deformed);
+void comparePairs(const Reference& reference, const WavefrontSibling& sibling, const WavefrontFile& wavefront,
+                  const std::vector<Pair>& pairs, Findings& findings) {
     std::vector<std::string> best;
     for (const Space& space : kSpaces) {
-        std::vector<std::string> differences = differencesIn(space, file.reference(), wavefront, pairs);
+        std::vector<std::string> differences = differencesIn(space, reference, wavefront, pairs);
         if (best.empty() || std::ranges::count(differences, "") > std::ranges::count(best, ""))
             best.swap(differences);
     }
@@ -185,6 +181,12 @@ void compareSibling(LoadedFile& file, const WavefrontSibling& sibling, bool defo
         findings.compare(best[i].empty(),
                          [&] { return sibling.path.filename().string() + " \"" + *pairs[i].name + "\" " + best[i]; });
     }
+}
+
+void compareSibling(LoadedFile& file, const WavefrontSibling& sibling, bool deformed, Findings& findings) {
+    const WavefrontFile wavefront = readWavefront(sibling.path);
+    const std::vector<Pair> pairs = pairsOf(file, wavefront, timeOf(sibling, file.reference()), deformed);
+    comparePairs(file.reference(), sibling, wavefront, pairs, findings);
 }
 
 } // namespace
@@ -200,6 +202,26 @@ void checkDeformedWavefrontPoints(LoadedFile& file, Findings& findings) {
     const OpenCaches open(file);
     for (const WavefrontSibling& sibling : file.file().wavefront)
         compareSibling(file, sibling, true, findings);
+}
+
+/// Frames of a clip that is not the scene's first count from the clip's start.
+double secondsOf(const WavefrontSibling& sibling, const Reference& reference) {
+    const double seconds = sibling.frame.value_or(0.0) / reference.fps;
+    const double start = reference.stacks.empty() ? 0.0 : reference.stacks[0].begin;
+    return seconds < start - kSecondsTolerance ? start + seconds : seconds;
+}
+
+void compareWithWavefront(LoadedFile& file, const WavefrontSibling& sibling, const PointSource& pointsOf,
+                          Findings& findings) {
+    const WavefrontFile wavefront = readWavefront(sibling.path);
+    const std::vector<ReferenceNode>& nodes = file.reference().nodes;
+    std::vector<Pair> pairs;
+    for (std::size_t i = 0; i < nodes.size(); ++i) {
+        const WavefrontBlock* block = nodes[i].mesh ? blockOf(wavefront, file, i) : nullptr;
+        if (block != nullptr) // else the application left the node out
+            pairs.push_back({&nodes[i].name, pointsOf(i), &block->points});
+    }
+    comparePairs(file.reference(), sibling, wavefront, pairs, findings);
 }
 
 } // namespace conformance
