@@ -6,192 +6,188 @@
 
 #include "FbxSdk.h"
 #include "calls/LastError.h"
-<<<<<<< HEAD
+#include "faithful/Reading.h"
 #include "sdk/NewFolders.h"
 #include "sdk/PointCachePlace.h"
-    =======
-#include "faithful/Reading.h"
-    >>>>>>> 7abbe48 (faithful: Hand hosts what the application shows when they ask for it)
 
 #include <algorithm>
 #include <cstddef>
 
-    namespace Tarnell::Fbx {
+namespace Tarnell::Fbx {
 
-    using detail::CallScope;
-    using detail::fail;
-    using detail::succeed;
+using detail::CallScope;
+using detail::fail;
+using detail::succeed;
 
-    namespace {
+namespace {
 
-    /// What the readers of two kinds of objects differ in.
-    template <class Object>
-    struct ReaderRow {
-        int (FbxSdk::*candidateCount)() const;
-        int mask;
-        bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int);
-    };
+/// What the readers of two kinds of objects differ in.
+template <class Object>
+struct ReaderRow {
+    int (FbxSdk::*candidateCount)() const;
+    int mask;
+    bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int);
+};
 
-    template <class Object>
-    constexpr ReaderRow<Object> kReader{};
-    template <>
-    constexpr ReaderRow<TnFbxMesh> kReader<TnFbxMesh> = {&FbxSdk::getNumberOfMeshes, 0x4, &FbxSdk::getMeshes};
-    template <>
-    constexpr ReaderRow<TnFbxCamera> kReader<TnFbxCamera> = {&FbxSdk::getNumberOfCameras, 0x20, &FbxSdk::getCameras};
-    template <>
-    constexpr ReaderRow<TnFbxLight> kReader<TnFbxLight> = {&FbxSdk::getNumberOfLights, 0x40, &FbxSdk::getLights};
-    template <>
-    constexpr ReaderRow<TnFbxMarker> kReader<TnFbxMarker> = {&FbxSdk::getNumberOfMarkers, 0x1, &FbxSdk::getMarkers};
-    template <>
-    constexpr ReaderRow<TnFbxNull> kReader<TnFbxNull> = {&FbxSdk::getNumberOfNulls, 0x4000, &FbxSdk::getNulls};
-    template <>
-    constexpr ReaderRow<TnFbxTransform> kReader<TnFbxTransform> = {&FbxSdk::getNumberOfTransforms, 0x4005,
-                                                                   &FbxSdk::getTransforms};
+template <class Object>
+constexpr ReaderRow<Object> kReader{};
+template <>
+constexpr ReaderRow<TnFbxMesh> kReader<TnFbxMesh> = {&FbxSdk::getNumberOfMeshes, 0x4, &FbxSdk::getMeshes};
+template <>
+constexpr ReaderRow<TnFbxCamera> kReader<TnFbxCamera> = {&FbxSdk::getNumberOfCameras, 0x20, &FbxSdk::getCameras};
+template <>
+constexpr ReaderRow<TnFbxLight> kReader<TnFbxLight> = {&FbxSdk::getNumberOfLights, 0x40, &FbxSdk::getLights};
+template <>
+constexpr ReaderRow<TnFbxMarker> kReader<TnFbxMarker> = {&FbxSdk::getNumberOfMarkers, 0x1, &FbxSdk::getMarkers};
+template <>
+constexpr ReaderRow<TnFbxNull> kReader<TnFbxNull> = {&FbxSdk::getNumberOfNulls, 0x4000, &FbxSdk::getNulls};
+template <>
+constexpr ReaderRow<TnFbxTransform> kReader<TnFbxTransform> = {&FbxSdk::getNumberOfTransforms, 0x4005,
+                                                               &FbxSdk::getTransforms};
 
-    template <class Object>
-    bool read(const Fbx& fbx, TnFbxReadInfo& info, Object** objects, int& count) {
-        const CallScope call;
-        if (objects == nullptr) {
-            return fail("no place for the array of objects");
-        }
-        *objects = nullptr;
-        count = 0;
-        if (info.getFidelity() == kFbxFidelityFaithful) {
-            return info.getFileName().empty() ? fail("the read options name no file")
-                                              : faithful::readObjects(info, objects, count);
-        }
-        if (!info.haveAnimationStack()) { // kept: the name is asked for, though the first stack is read in any case
-            return fail("the read options name no animation stack");
-        }
-        if (info.getFileName().empty()) {
-            return fail("the read options name no file");
-        }
-        FbxSdk sdk;
-        if (!fbx.loadScene(info.getFileName(), sdk)) {
-            return false;
-        }
+template <class Object>
+bool read(const Fbx& fbx, TnFbxReadInfo& info, Object** objects, int& count) {
+    const CallScope call;
+    if (objects == nullptr) {
+        return fail("no place for the array of objects");
+    }
+    *objects = nullptr;
+    count = 0;
+    if (info.getFidelity() == kFbxFidelityFaithful) {
+        return info.getFileName().empty() ? fail("the read options name no file")
+                                          : faithful::readObjects(info, objects, count);
+    }
+    if (!info.haveAnimationStack()) { // kept: the name is asked for, though the first stack is read in any case
+        return fail("the read options name no animation stack");
+    }
+    if (info.getFileName().empty()) {
+        return fail("the read options name no file");
+    }
+    FbxSdk sdk;
+    if (!fbx.loadScene(info.getFileName(), sdk)) {
+        return false;
+    }
 
-        const ReaderRow<Object>& row = kReader<Object>;
-        count = fbx.getNumberOfObjects((sdk.*row.candidateCount)(), info.getAllObjects(), row.mask,
-                                       info.getObjectName(), sdk);
-        bool result = succeed();
-        if (count >= 1) {
-            *objects = new Object[static_cast<std::size_t>(count)];
-            result = (sdk.*row.fill)(info, *objects, count);
-        }
+    const ReaderRow<Object>& row = kReader<Object>;
+    count =
+        fbx.getNumberOfObjects((sdk.*row.candidateCount)(), info.getAllObjects(), row.mask, info.getObjectName(), sdk);
+    bool result = succeed();
+    if (count >= 1) {
+        *objects = new Object[static_cast<std::size_t>(count)];
+        result = (sdk.*row.fill)(info, *objects, count);
+    }
+    sdk.destroyFbxSdkManager();
+    return result;
+}
+
+} // namespace
+
+Fbx::Fbx() = default;
+
+Fbx::~Fbx() = default;
+
+Fbx& Fbx::operator=(const Fbx& /*other*/) = default;
+
+bool Fbx::loadScene(const std::string& fileName, FbxSdk& sdk) const {
+    const CallScope call;
+    if (fileName.empty()) {
+        return fail("no file name is given");
+    }
+    if (!sdk.initFbxSdkManager()) {
+        return false;
+    }
+    if (!sdk.loadScene(fileName, /*convertGeometry*/ true)) {
         sdk.destroyFbxSdkManager();
-        return result;
+        return false;
     }
+    return true;
+}
 
-    } // namespace
-
-    Fbx::Fbx() = default;
-
-    Fbx::~Fbx() = default;
-
-    Fbx& Fbx::operator=(const Fbx& /*other*/) = default;
-
-    bool Fbx::loadScene(const std::string& fileName, FbxSdk& sdk) const {
-        const CallScope call;
-        if (fileName.empty()) {
-            return fail("no file name is given");
-        }
-        if (!sdk.initFbxSdkManager()) {
-            return false;
-        }
-        if (!sdk.loadScene(fileName, /*convertGeometry*/ true)) {
-            sdk.destroyFbxSdkManager();
-            return false;
-        }
-        return true;
+int Fbx::getNumberOfObjects(int count, bool allObjects, int nodeTypeMask, const std::string& objectName,
+                            FbxSdk& sdk) const {
+    if (count < 0) {
+        return 0;
     }
-
-    int Fbx::getNumberOfObjects(int count, bool allObjects, int nodeTypeMask, const std::string& objectName,
-                                FbxSdk& sdk) const {
-        if (count < 0) {
-            return 0;
-        }
-        if (allObjects) {
-            return count;
-        }
-        std::vector<std::string> names;
-        if (objectName.empty() || !sdk.getNodeNames(nodeTypeMask, names)) {
-            return 0;
-        }
-        return std::find(names.begin(), names.end(), objectName) != names.end() ? 1 : 0;
+    if (allObjects) {
+        return count;
     }
-
-    bool Fbx::getAnimationStackNodeNames(const char* fileName, long nodeTypeMask, std::vector<std::string>& stackNames,
-                                         std::vector<std::string>& nodeNames) const {
-        const CallScope call;
-        FbxSdk sdk;
-        if (!loadScene(fileName != nullptr ? fileName : "", sdk)) {
-            return false;
-        }
-        const bool result = sdk.getAnimationStackNames(stackNames) && sdk.getNodeNames(nodeTypeMask, nodeNames);
-        sdk.destroyFbxSdkManager();
-        return result;
+    std::vector<std::string> names;
+    if (objectName.empty() || !sdk.getNodeNames(nodeTypeMask, names)) {
+        return 0;
     }
+    return std::find(names.begin(), names.end(), objectName) != names.end() ? 1 : 0;
+}
 
-    bool Fbx::getAnimationFrameRange(const char* fileName, float& start, float& end) const {
-        const CallScope call;
-        FbxSdk sdk;
-        if (!loadScene(fileName != nullptr ? fileName : "", sdk)) {
-            return false;
-        }
-        const bool result = sdk.getAnimationFrameRange(start, end);
-        sdk.destroyFbxSdkManager();
-        return result;
+bool Fbx::getAnimationStackNodeNames(const char* fileName, long nodeTypeMask, std::vector<std::string>& stackNames,
+                                     std::vector<std::string>& nodeNames) const {
+    const CallScope call;
+    FbxSdk sdk;
+    if (!loadScene(fileName != nullptr ? fileName : "", sdk)) {
+        return false;
     }
+    const bool result = sdk.getAnimationStackNames(stackNames) && sdk.getNodeNames(nodeTypeMask, nodeNames);
+    sdk.destroyFbxSdkManager();
+    return result;
+}
 
-    bool Fbx::getMeshes(TnFbxReadInfo & info, TnFbxMesh * *objects, int& count) const {
-        return read(*this, info, objects, count);
+bool Fbx::getAnimationFrameRange(const char* fileName, float& start, float& end) const {
+    const CallScope call;
+    FbxSdk sdk;
+    if (!loadScene(fileName != nullptr ? fileName : "", sdk)) {
+        return false;
     }
+    const bool result = sdk.getAnimationFrameRange(start, end);
+    sdk.destroyFbxSdkManager();
+    return result;
+}
 
-    bool Fbx::getCameras(TnFbxReadInfo & info, TnFbxCamera * *objects, int& count) const {
-        return read(*this, info, objects, count);
-    }
+bool Fbx::getMeshes(TnFbxReadInfo& info, TnFbxMesh** objects, int& count) const {
+    return read(*this, info, objects, count);
+}
 
-    bool Fbx::getLights(TnFbxReadInfo & info, TnFbxLight * *objects, int& count) const {
-        return read(*this, info, objects, count);
-    }
+bool Fbx::getCameras(TnFbxReadInfo& info, TnFbxCamera** objects, int& count) const {
+    return read(*this, info, objects, count);
+}
 
-    bool Fbx::getMarkers(TnFbxReadInfo & info, TnFbxMarker * *objects, int& count) const {
-        return read(*this, info, objects, count);
-    }
+bool Fbx::getLights(TnFbxReadInfo& info, TnFbxLight** objects, int& count) const {
+    return read(*this, info, objects, count);
+}
 
-    bool Fbx::getNulls(TnFbxReadInfo & info, TnFbxNull * *objects, int& count) const {
-        return read(*this, info, objects, count);
-    }
+bool Fbx::getMarkers(TnFbxReadInfo& info, TnFbxMarker** objects, int& count) const {
+    return read(*this, info, objects, count);
+}
 
-    bool Fbx::getTransforms(TnFbxReadInfo & info, TnFbxTransform * *objects, int& count) const {
-        return read(*this, info, objects, count);
-    }
+bool Fbx::getNulls(TnFbxReadInfo& info, TnFbxNull** objects, int& count) const {
+    return read(*this, info, objects, count);
+}
 
-    bool Fbx::writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
-                        const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
-                        const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const {
-        const CallScope call;
-        if (info.getFileName().empty()) {
-            return fail("the write options name no file");
-        }
-        if (info.getAnimationStackName()
-                .empty()) { // kept: the name is asked for, though the written stack bears another
-            return fail("the write options name no animation stack");
-        }
-        const auto place = detail::pointCachePlace(info.getFileName(), /*nodeName*/ "", /*extension*/ "");
-        detail::NewFolders folders(std::string(place.folder)); // goes after the context, which takes its files away
-        FbxSdk sdk;
-        if (!sdk.initFbxSdkManager()) {
-            return false;
-        }
-        sdk.letPointCachesAppearWithScene();
-        const bool result = sdk.createScene(info, cameras, lights, transforms, nulls, meshes) && sdk.saveScene(info);
-        sdk.destroyFbxSdkManager();
-        if (result) {
-            folders.keep();
-        }
-        return result;
+bool Fbx::getTransforms(TnFbxReadInfo& info, TnFbxTransform** objects, int& count) const {
+    return read(*this, info, objects, count);
+}
+
+bool Fbx::writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
+                    const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
+                    const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const {
+    const CallScope call;
+    if (info.getFileName().empty()) {
+        return fail("the write options name no file");
     }
+    if (info.getAnimationStackName().empty()) { // kept: the name is asked for, though the written stack bears another
+        return fail("the write options name no animation stack");
+    }
+    const auto place = detail::pointCachePlace(info.getFileName(), /*nodeName*/ "", /*extension*/ "");
+    detail::NewFolders folders(std::string(place.folder)); // goes after the context, which takes its files away
+    FbxSdk sdk;
+    if (!sdk.initFbxSdkManager()) {
+        return false;
+    }
+    sdk.letPointCachesAppearWithScene();
+    const bool result = sdk.createScene(info, cameras, lights, transforms, nulls, meshes) && sdk.saveScene(info);
+    sdk.destroyFbxSdkManager();
+    if (result) {
+        folders.keep();
+    }
+    return result;
+}
 
 } // namespace Tarnell::Fbx

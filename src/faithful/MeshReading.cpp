@@ -238,7 +238,7 @@ bool fillColours(FbxMesh& source, const FbxNode& node, const Corners& corners, M
     return found;
 }
 
-bool fillMesh(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, std::int64_t cornerCount,
+void fillMesh(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, std::int64_t cornerCount,
               TnFbxMesh& mesh) {
     const Corners corners(source, placed.mirrored());
     bool normals = false, uvs = false, colours = false;
@@ -261,7 +261,6 @@ bool fillMesh(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, st
     mesh.setValidNormals(normals);
     mesh.setValidUVs(uvs);
     mesh.setValidColours(colours);
-    return true;
 }
 
 /// What the arrays of a mesh take: for each corner an index, a normal, a texture coordinate and a colour.
@@ -288,7 +287,8 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
     const FbxTime time = scene.now();
     const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
     try {
-        return fillMesh(source, node, placed, cornerCount, mesh);
+        fillMesh(source, node, placed, cornerCount, mesh);
+        return true;
     } catch (const std::runtime_error& error) { // what the platform says of a layer element without its array
         mesh.initMesh();
         return detail::fail(scene.fileName() + ": the layers of \"" + node.GetName() + "\" are damaged (" +
