@@ -7,6 +7,7 @@
 #include "TnFbxExport.h"
 #include "TnFbxTime.h"
 
+#include <cstddef>
 #include <vector>
 
 namespace Tarnell::Fbx {
@@ -15,9 +16,15 @@ namespace Tarnell::Fbx {
 ///
 /// There are no keys, tangents or curve types: sample k belongs to frame `startFrame + k`, and neighbours are joined by
 /// straight lines. The static value and the samples never change each other.
+///
+/// Samples that are all equal, to the bit, take the memory of one.
 class TARNELL_FBX_API TnFbxChannel {
 public:
     static constexpr float kDefaultChannelValue = 0.0f;
+
+    /// The most samples that one `setValueAt` adds to those in memory, 2^25 (128 MiB): every whole frame that a float
+    /// tells from its neighbours lies within as many.
+    static constexpr std::size_t kMostAddedSamples = std::size_t{1} << 25;
 
     /// Not animated, no samples, static value 0.
     TnFbxChannel();
@@ -38,11 +45,13 @@ public:
     bool setValue(float value);
     float getValue() const;
 
-    /// Sets the sample at one whole frame and makes the channel animated; always true.
+    /// Sets the sample at one whole frame and makes the channel animated.
     ///
     /// `frame` is truncated toward zero; what lies beyond the range of an int counts as the int nearest to it, and NaN
     /// as the lowest int. A frame outside the range widens the range up to it, and the frames in between read 0, not
     /// their neighbours and not the static value. Frame and rate of the time record are not touched.
+    /// False, and nothing changes, for a frame so far from the range, as NaN and infinity are from most, that more than
+    /// `kMostAddedSamples` samples would be added to those in memory.
     /// Cost: memory for the whole gap; when that is not to be had the standard exception passes through and the
     /// channel is as before.
     bool setValueAt(float frame, float value);
@@ -55,6 +64,9 @@ public:
     bool setAnimatedValues(TnFbxTime time, const std::vector<float>& values);
     bool setAnimatedValues(TnFbxTime time, std::vector<float>&& values);
 
+    /// The same with one value for every frame of the range, at the cost of one sample.
+    bool setConstantValues(TnFbxTime time, float value);
+
     /// The value at a possibly fractional frame; the static value when there are no samples.
     ///
     /// Outside the range the end samples hold. Within it the sample of the frame truncated toward zero is joined to the
@@ -64,12 +76,22 @@ public:
     bool getAnimated() const;
     TnFbxTime getTime() const; ///< A copy of the time record.
 
+    /// Whether the value is the same at every frame: without samples, and where all are kept as one.
+    bool isConstant() const;
+
 private:
+    float sampleAt(std::size_t index) const { return mValues[mValues.size() > 1 ? index : 0]; }
+    std::size_t indexOf(int frame) const;
+    std::size_t countToCover(int frame) const;
+    void keepAsOne(const TnFbxTime& time, std::size_t count, float value);
+    void takeOver(const TnFbxTime& time, std::size_t count);
+    void spread();
     void coverFrame(int frame);
 
     bool mAnimated;
     TnFbxTime mTime;
-    std::vector<float> mValues;
+    std::vector<float> mValues; // the samples, or the one that all of them are
+    std::size_t mCount;         // of the samples
     float mValue;
 };
 

@@ -49,7 +49,7 @@ public:
     bool deleteMarker();
 
     /// The static value of a channel, and all its samples at once (`TnFbxChannel::setAnimatedValues`, with its result).
-    /// False when there is no such channel; nothing changes then.
+    /// False when there is no such channel; nothing changes then. A single sample is set through `getMarkerChannel`.
     bool setValue(EFbxMarkerChannelType channel, float value);
     bool setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, const std::vector<float>& values);
     bool setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, std::vector<float>&& values);
@@ -59,6 +59,9 @@ public:
     float getValueAt(EFbxMarkerChannelType channel, float frame) const;
     bool getAnimated(EFbxMarkerChannelType channel) const;
     TnFbxTime getTime(EFbxMarkerChannelType channel) const;
+
+    /// The channel itself, owned by the marker; null when there is no such channel.
+    TnFbxChannel* getMarkerChannel(EFbxMarkerChannelType channel);
 
     /// The channel's printable name, a constant; null when there is no such channel.
     static const char* getChannelName(EFbxMarkerChannelType channel);

@@ -1,7 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Samples at whole frames: how a range grows, and how it is evaluated in between.
+// Samples at whole frames: how a range grows, and how it is evaluated in between. Samples that are all equal are kept
+// as one; whoever changes one of them spreads them out first.
 //
 // Spans of frames are computed in 64 bits, so that ranges may reach from the lowest int to the highest.
 #include "TnFbxChannel.h"
@@ -11,6 +12,7 @@
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <utility>
 
 namespace Tarnell::Fbx {
@@ -30,13 +32,26 @@ float clampToRange(float frame, const TnFbxTime& time) {
     return frame > end ? end : frame;
 }
 
+/// Whether the record can say what samples belong to.
+bool isRange(const TnFbxTime& time) {
+    return time.getStartFrame() <= time.getEndFrame() && !(time.getFrameRate() <= 0.0f); // kept: a rate of NaN passes
+}
+
+std::size_t framesOf(const TnFbxTime& time) {
+    return static_cast<std::size_t>(detail::frameCount(time.getStartFrame(), time.getEndFrame()));
+}
+
 /// Whether the range and so many values make samples.
 bool areSamples(const TnFbxTime& time, std::size_t valueCount) {
-    if (time.getStartFrame() > time.getEndFrame() || valueCount == 0 || time.getFrameRate() <= 0.0f) {
-        return false; // kept: a rate of NaN passes
-    }
-    return detail::frameCount(time.getStartFrame(), time.getEndFrame()) <= static_cast<std::int64_t>(valueCount);
+    return isRange(time) && valueCount > 0 && framesOf(time) <= valueCount;
 }
+
+/// To the bit: 0 and −0 differ, and a NaN is equal to itself.
+bool areAllEqual(const std::vector<float>& values) {
+    return values.size() < 2 || std::memcmp(values.data(), values.data() + 1, (values.size() - 1) * sizeof(float)) == 0;
+}
+
+bool areEqual(float a, float b) { return std::memcmp(&a, &b, sizeof a) == 0; }
 
 } // namespace
 
@@ -47,6 +62,7 @@ TnFbxChannel::~TnFbxChannel() { deleteChannel(); }
 TnFbxChannel& TnFbxChannel::operator=(const TnFbxChannel& other) {
     if (this != &other) {
         mValues = other.mValues;
+        mCount = other.mCount;
         mAnimated = other.mAnimated;
         mTime = other.mTime;
         mValue = other.mValue;
@@ -66,6 +82,7 @@ bool TnFbxChannel::deleteChannel() { return initChannel(); }
 
 bool TnFbxChannel::deleteAnimatedValues() {
     mValues.clear();
+    mCount = 0;
     mAnimated = false;
     return true;
 }
@@ -79,10 +96,43 @@ float TnFbxChannel::getValue() const { return mValue; }
 
 bool TnFbxChannel::setValueAt(float frame, float value) {
     const int wholeFrame = detail::truncateToInt(frame);
+    const bool isCovered = mCount > 0 && wholeFrame >= mTime.getStartFrame() && wholeFrame <= mTime.getEndFrame();
+    if (isCovered && areEqual(sampleAt(indexOf(wholeFrame)), value)) {
+        mAnimated = true;
+        return true;
+    }
+    if (countToCover(wholeFrame) > mValues.size() + kMostAddedSamples) {
+        return false;
+    }
+    spread();
     coverFrame(wholeFrame);
-    mValues[static_cast<std::size_t>(std::int64_t{wholeFrame} - mTime.getStartFrame())] = value;
+    mValues[indexOf(wholeFrame)] = value;
     mAnimated = true;
     return true;
+}
+
+std::size_t TnFbxChannel::indexOf(int frame) const {
+    return static_cast<std::size_t>(std::int64_t{frame} - mTime.getStartFrame());
+}
+
+/// How many samples there are once the range includes the frame.
+std::size_t TnFbxChannel::countToCover(int frame) const {
+    if (mCount == 0) {
+        return 1;
+    }
+    const int start = mTime.getStartFrame();
+    const int end = mTime.getEndFrame();
+    if (frame < start) {
+        return mCount + static_cast<std::size_t>(std::int64_t{start} - frame);
+    }
+    return frame > end ? static_cast<std::size_t>(detail::frameCount(start, frame)) : mCount;
+}
+
+/// Gives every sample a place of its own.
+void TnFbxChannel::spread() {
+    if (mValues.size() < mCount) {
+        mValues.resize(mCount, mValues.front());
+    }
 }
 
 // Widens the range to include a frame:
@@ -108,15 +158,19 @@ void TnFbxChannel::coverFrame(int frame) {
         mValues.resize(static_cast<std::size_t>(frame - start + 1), 0.0f);
         mTime.setEndFrame(frame);
     }
+    mCount = mValues.size();
 }
 
 bool TnFbxChannel::setAnimatedValues(TnFbxTime time, const std::vector<float>& values) {
     if (!areSamples(time, values.size())) {
         return false;
     }
-    mValues = values;
-    mTime = time;
-    mAnimated = true;
+    if (areAllEqual(values)) {
+        keepAsOne(time, values.size(), values.front());
+    } else {
+        mValues = values;
+        takeOver(time, mValues.size());
+    }
     return true;
 }
 
@@ -124,10 +178,32 @@ bool TnFbxChannel::setAnimatedValues(TnFbxTime time, std::vector<float>&& values
     if (!areSamples(time, values.size())) {
         return false;
     }
-    mValues = std::move(values);
+    if (areAllEqual(values)) {
+        keepAsOne(time, values.size(), values.front());
+    } else {
+        mValues = std::move(values);
+        takeOver(time, mValues.size());
+    }
+    return true;
+}
+
+bool TnFbxChannel::setConstantValues(TnFbxTime time, float value) {
+    if (!isRange(time)) {
+        return false;
+    }
+    keepAsOne(time, framesOf(time), value);
+    return true;
+}
+
+void TnFbxChannel::keepAsOne(const TnFbxTime& time, std::size_t count, float value) {
+    mValues.assign(1, value);
+    takeOver(time, count);
+}
+
+void TnFbxChannel::takeOver(const TnFbxTime& time, std::size_t count) {
+    mCount = count;
     mTime = time;
     mAnimated = true;
-    return true;
 }
 
 // The animated flag plays no part here: a channel without samples is what counts as static.
@@ -138,22 +214,24 @@ float TnFbxChannel::getAnimatedValue(float frame) const {
     const float clamped = clampToRange(frame, mTime);
     const int whole = detail::truncateToInt(clamped); // kept: toward zero, so frame −4.5 starts from −4
     const std::int64_t index = std::int64_t{whole} - mTime.getStartFrame();
-    const std::int64_t count = static_cast<std::int64_t>(mValues.size());
+    const auto count = static_cast<std::int64_t>(mCount);
     if (index < 0 || index >= count) {
         return mValue; // beyond 2^24 the float of the last frame can lie after the frame itself
     }
 
-    const float sample = mValues[static_cast<std::size_t>(index)];
+    const float sample = sampleAt(static_cast<std::size_t>(index));
     const float wholeFrame = static_cast<float>(whole);
     if (std::fabs(wholeFrame - clamped) < kExactFrameTolerance || index + 1 >= count) {
         return sample;
     }
-    const float next = mValues[static_cast<std::size_t>(index + 1)];
+    const float next = sampleAt(static_cast<std::size_t>(index + 1));
     return sample + (clamped - wholeFrame) * (next - sample);
 }
 
 bool TnFbxChannel::getAnimated() const { return mAnimated; }
 
 TnFbxTime TnFbxChannel::getTime() const { return mTime; }
+
+bool TnFbxChannel::isConstant() const { return mValues.size() < 2; }
 
 } // namespace Tarnell::Fbx

@@ -79,7 +79,7 @@ TEST(Allocation, AGapWithoutMemoryThrowsAndLeavesTheChannelAsItWas) {
     TnFbxChannel channel = channelOver(10, {1.0f, 2.0f});
     const AllocationLimit limit(kSixteenMegabytes);
 
-    for (const float farFrame : {1e9f, -1e9f, kInfinity, -kInfinity, kNaN}) {
+    for (const float farFrame : {2e7f, -2e7f}) {
         SCOPED_TRACE(farFrame);
         EXPECT_THROW(channel.setValueAt(farFrame, 5.0f), std::bad_alloc);
         EXPECT_TRUE(channel.getAnimated());
@@ -88,16 +88,49 @@ TEST(Allocation, AGapWithoutMemoryThrowsAndLeavesTheChannelAsItWas) {
     }
 }
 
-TEST(Allocation, TheWidestGapOfAllThrowsToo) {
-    TnFbxChannel channel;
-    channel.setValueAt(-kInfinity, 1.0f);
-    const AllocationLimit limit(kSixteenMegabytes);
+TEST(Allocation, AGapThatNobodyMeansIsRefusedBeforeMemoryIsAskedFor) {
+    TnFbxChannel channel = channelOver(10, {1.0f, 2.0f});
+    const float beyond = static_cast<float>(TnFbxChannel::kMostAddedSamples) + 100.0f;
 
-    EXPECT_THROW(channel.setValueAt(kInfinity, 2.0f), std::bad_alloc);
+    for (const float farFrame : {beyond, -beyond, 1e9f, -1e9f, kInfinity, -kInfinity, kNaN}) {
+        SCOPED_TRACE(farFrame);
+        EXPECT_EQ(allocationsOf([&] { EXPECT_FALSE(channel.setValueAt(farFrame, 5.0f)); }), 0u);
+        EXPECT_TRUE(channel.getAnimated());
+        expectTime(channel.getTime(), 0.0f, 10, 11, 24.0f);
+        EXPECT_EQ(samplesOf(channel), (Samples{1.0f, 2.0f}));
+    }
+}
+
+TEST(Allocation, TheWidestGapOfAllIsRefused) {
+    TnFbxChannel channel;
+    ASSERT_TRUE(channel.setValueAt(-kInfinity, 1.0f));
+
+    EXPECT_FALSE(channel.setValueAt(kInfinity, 2.0f));
 
     EXPECT_EQ(channel.getTime().getStartFrame(), test::kLowest);
     EXPECT_EQ(channel.getTime().getEndFrame(), test::kLowest);
     EXPECT_EQ(channel.getAnimatedValue(0.0f), 1.0f);
+}
+
+TEST(Allocation, AConstantChannelTakesTheMemoryOfOneSample) {
+    const AllocationLimit limit(kSixteenMegabytes);
+    TnFbxChannel channel;
+
+    ASSERT_TRUE(channel.setConstantValues(range(test::kLowest, test::kHighest), 2.5f));
+
+    EXPECT_TRUE(channel.isConstant());
+    EXPECT_EQ(channel.getAnimatedValue(-2e9f), 2.5f);
+    EXPECT_EQ(channel.getAnimatedValue(0.5f), 2.5f);
+    const TnFbxChannel copy = channel;
+    EXPECT_EQ(copy.getAnimatedValue(2e9f), 2.5f);
+    TnFbxChannel assigned;
+    assigned = channel;
+    EXPECT_EQ(assigned.getAnimatedValue(2e9f), 2.5f);
+
+    EXPECT_TRUE(channel.setValueAt(7.0f, 2.5f));  // nothing changes
+    EXPECT_FALSE(channel.setValueAt(7.0f, 3.0f)); // 2^32 samples would have to be stored
+    EXPECT_EQ(channel.getAnimatedValue(7.0f), 2.5f);
+    EXPECT_TRUE(channel.isConstant());
 }
 
 TEST(Allocation, AGapThatFitsIsFilled) {
@@ -113,7 +146,8 @@ TEST(Allocation, AGapThatFitsIsFilled) {
 }
 
 TEST(Allocation, ClearingAChannelKeepsItsMemoryForTheNextSamples) {
-    const Samples values(1000, 1.0f);
+    Samples values(1000, 1.0f);
+    values.back() = 2.0f;
     TnFbxChannel channel;
     channel.setAnimatedValues(range(1, 1000), values);
 

@@ -6,6 +6,11 @@
 
 #include "ModelValues.h"
 
+#include <bit>
+#include <cstddef>
+#include <cstdint>
+#include <iterator>
+#include <random>
 #include <type_traits>
 #include <vector>
 
@@ -330,6 +335,110 @@ TEST(TnFbxChannel, ACopyIsIndependentOfItsSource) {
     source.deleteChannel();
 
     expectFilled(copy);
+}
+
+// ---- Samples that are all equal are kept as one; nobody must be able to tell ----
+
+std::uint32_t bitsOf(float value) { return std::bit_cast<std::uint32_t>(value); }
+
+/// The rules for samples, written down a second time with every sample in its place.
+class PlainSamples {
+public:
+    void set(int start, const Samples& values) {
+        mStart = start;
+        mEnd = start + static_cast<int>(values.size()) - 1;
+        mValues = values;
+    }
+    void setWithSurplus(int start, int end, const Samples& values) {
+        mStart = start;
+        mEnd = end;
+        mValues = values;
+    }
+    void setAt(int frame, float value) {
+        if (mValues.empty()) {
+            set(frame, {value});
+        } else if (frame < mStart) {
+            mValues.insert(mValues.begin(), static_cast<std::size_t>(mStart - frame), 0.0f);
+            mStart = frame;
+        } else if (frame > mEnd) {
+            mValues.resize(static_cast<std::size_t>(mEnd - mStart + 1));
+            mValues.resize(static_cast<std::size_t>(frame - mStart + 1), 0.0f);
+            mEnd = frame;
+        }
+        mValues[static_cast<std::size_t>(frame - mStart)] = value;
+    }
+    void expectIn(const TnFbxChannel& channel) const {
+        EXPECT_EQ(channel.getTime().getStartFrame(), mStart);
+        EXPECT_EQ(channel.getTime().getEndFrame(), mEnd);
+        for (int frame = mStart; frame <= mEnd; ++frame) {
+            const float sample = channel.getAnimatedValue(static_cast<float>(frame));
+            EXPECT_EQ(bitsOf(sample), bitsOf(mValues[static_cast<std::size_t>(frame - mStart)])) << frame;
+        }
+    }
+
+private:
+    int mStart = 0, mEnd = 0;
+    Samples mValues;
+};
+
+TEST(TnFbxChannel, KeepsEqualSamplesAsOneWithoutShowingIt) {
+    const float payload = std::bit_cast<float>(std::uint32_t{0x7fc00123});
+    const float values[] = {0.0f, -0.0f, 1.0f, 1.0f, 1.0f, kNaN, payload, kInfinity};
+    std::minstd_rand random(1);
+    const auto pick = [&random](std::size_t count) { return static_cast<std::size_t>(random()) % count; };
+    for (int round = 0; round < 300; ++round) {
+        TnFbxChannel channel;
+        PlainSamples plain;
+        for (int step = 0; step < 12; ++step) {
+            const int frame = static_cast<int>(pick(24)) - 12;
+            const float value = values[pick(std::size(values))];
+            const Samples all(1 + pick(5), value);
+            switch (pick(6)) {
+            case 0:
+                EXPECT_TRUE(channel.setAnimatedValues(range(frame, frame + static_cast<int>(all.size()) - 1), all));
+                plain.set(frame, all);
+                break;
+            case 1: // with samples beyond the range
+                EXPECT_TRUE(channel.setAnimatedValues(range(frame, frame), all));
+                plain.setWithSurplus(frame, frame, all);
+                break;
+            case 2:
+                EXPECT_TRUE(channel.setConstantValues(range(frame, frame + 4), value));
+                plain.set(frame, Samples(5, value));
+                break;
+            default:
+                EXPECT_TRUE(channel.setValueAt(static_cast<float>(frame), value));
+                plain.setAt(frame, value);
+            }
+            plain.expectIn(TnFbxChannel(channel));
+            ASSERT_FALSE(HasFailure()) << "round " << round << ", step " << step;
+        }
+    }
+}
+
+TEST(TnFbxChannel, TellsZerosAndNaNsApartWhereItKeepsOneSample) {
+    EXPECT_TRUE(channelOver(1, {2.0f, 2.0f, 2.0f}).isConstant());
+    EXPECT_TRUE(channelOver(1, {kNaN, kNaN}).isConstant());
+    EXPECT_FALSE(channelOver(1, {0.0f, -0.0f}).isConstant());
+    EXPECT_FALSE(channelOver(1, {kNaN, std::bit_cast<float>(std::uint32_t{0x7fc00123})}).isConstant());
+    EXPECT_TRUE(TnFbxChannel().isConstant());
+}
+
+TEST(TnFbxChannel, RefusesAConstantForWhatIsNoRange) {
+    for (const TnFbxTime& time : {range(2, 1), timeRecord(0.0f, 1, 2, 0.0f), timeRecord(0.0f, 1, 2, -24.0f)}) {
+        TnFbxChannel channel = filledChannel();
+        EXPECT_FALSE(channel.setConstantValues(time, 9.0f));
+        expectFilled(channel);
+    }
+}
+
+TEST(TnFbxChannel, InterpolatesBetweenEqualSamplesAsBetweenOthers) {
+    TnFbxChannel channel;
+    ASSERT_TRUE(channel.setConstantValues(range(-5, 5), -0.0f));
+
+    EXPECT_EQ(bitsOf(channel.getAnimatedValue(2.0f)), bitsOf(-0.0f));
+    EXPECT_EQ(bitsOf(channel.getAnimatedValue(2.5f)), bitsOf(-0.0f + 0.5f * (-0.0f - -0.0f)));
+    EXPECT_EQ(channel.getAnimatedValue(100.0f), -0.0f);
 }
 
 } // namespace
