@@ -85,7 +85,12 @@ detail::CurveKeys& FbxAnimCurve::editKeys() {
 
 void FbxAnimCurve::KeyModifyBegin() {}
 
-void FbxAnimCurve::KeyModifyEnd() {}
+void FbxAnimCurve::KeyModifyEnd() {
+    // No more keys for now: the lists give back what they grew by.
+    mKeys->times.shrink_to_fit();
+    mKeys->values.shrink_to_fit();
+    mKeys->attributeOfKey.shrink_to_fit();
+}
 
 void FbxAnimCurve::KeyClear() {
     detail::CurveKeys& keys = editKeys();

@@ -3,9 +3,10 @@
 //
 // Evaluation of node transforms.
 //
-// Hosts read one node after another, each over all frames. So every node with children keeps its global transforms by
-// time: a node then costs one local matrix and one product per frame, however deep it hangs. The cache of a manager is
-// bounded; when it is full the node that was not asked for longest loses its own.
+// Hosts read one node after another, each over many times. So every moving node with children keeps its global
+// transforms by time: a node then costs one local matrix and one product per time, however deep it hangs. What nothing
+// moves has one transform. The caches of a manager are bounded together; when they are full the node that was not asked
+// for longest loses its own.
 #include "scene/NodeEvaluation.h"
 
 #include <algorithm>
@@ -22,210 +23,195 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// The parts of a node's transform that do not change with time, and the three properties that may.
+/// The parts of a moving node's transform that do not change with time, and the three properties that may.
 struct TransformBinding {
     AnimatedProperty translation, rotation, scaling;
-    FbxAMatrix preRotation, postRotationInverse;
+    Linear preRotation, postRotationInverse;
     FbxVector4 rotationOffset, rotationPivot, scalingOffset, scalingPivot;
     FbxEuler::EOrder order = FbxEuler::eOrderXYZ;
-    FbxTransform::EInheritType inherit = FbxTransform::eInheritRrSs;
-    bool animated = false; ///< any of the three has curves
     bool hasPivots = false;
 };
 
 namespace {
 
-/// 16 MiB of cached transforms per manager.
-constexpr std::size_t kMaximumCachedTransforms = (std::size_t{16} << 20U) / sizeof(GlobalTransform);
+// ---- Arithmetic on the linear parts of matrices ----
 
-/// A node's own matrices at one time.
-struct LocalTransform {
-    FbxVector4 translation; ///< the translation column of the local matrix, pivots included
-    FbxAMatrix rotation;    ///< Rpre R Rpost⁻¹
-    FbxVector4 scaling;
-};
+constexpr Linear kIdentity = {{{1, 0, 0}, {0, 1, 0}, {0, 0, 1}}};
 
-bool isZero(const FbxVector4& vector) { return vector[0] == 0.0 && vector[1] == 0.0 && vector[2] == 0.0; }
-
-FbxVector4 pointAt(const FbxVector4& vector) { return {vector[0], vector[1], vector[2], 1.0}; }
-
-std::unique_ptr<TransformBinding> bindTransform(FbxNode& node) {
-    auto binding = std::make_unique<TransformBinding>();
-    FbxScene* scene = node.GetScene();
-    FbxAnimStack* stack = scene ? scene->GetCurrentAnimationStack() : nullptr;
-    binding->translation = bindAnimation(node.LclTranslation, stack);
-    binding->rotation = bindAnimation(node.LclRotation, stack);
-    binding->scaling = bindAnimation(node.LclScaling, stack);
-    binding->animated = binding->translation.animated() || binding->rotation.animated() || binding->scaling.animated();
-
-    // Pre- and post-rotation and the order are in force only while rotation is active, and not for its limits alone.
-    if (node.GetRotationActive() && !node.GetRotationSpaceForLimitOnly(FbxNode::eSourcePivot)) {
-        binding->preRotation = rotationMatrix(node.GetPreRotation(FbxNode::eSourcePivot), FbxEuler::eOrderXYZ);
-        binding->postRotationInverse =
-            rotationMatrix(node.GetPostRotation(FbxNode::eSourcePivot), FbxEuler::eOrderXYZ).Transpose();
-        node.GetRotationOrder(FbxNode::eSourcePivot, binding->order);
+/// a after b. The zero at the end is what the fourth row adds in a full product: there is no negative zero in the
+/// result.
+inline Linear operator*(const Linear& a, const Linear& b) {
+    Linear result;
+    for (std::size_t i = 0; i < 3; ++i) {
+        for (std::size_t j = 0; j < 3; ++j)
+            result[i][j] = a[0][j] * b[i][0] + a[1][j] * b[i][1] + a[2][j] * b[i][2] + 0.0;
     }
-    binding->rotationOffset = node.GetRotationOffset(FbxNode::eSourcePivot);
-    binding->rotationPivot = node.GetRotationPivot(FbxNode::eSourcePivot);
-    binding->scalingOffset = node.GetScalingOffset(FbxNode::eSourcePivot);
-    binding->scalingPivot = node.GetScalingPivot(FbxNode::eSourcePivot);
-    binding->hasPivots = !isZero(binding->rotationOffset) || !isZero(binding->rotationPivot) ||
-                         !isZero(binding->scalingOffset) || !isZero(binding->scalingPivot);
-    node.GetTransformationInheritType(binding->inherit);
-    return binding;
+    return result;
 }
 
-std::uint64_t revisionOf(const FbxNode& node) { return node.GetFbxManager()->data().revision; }
+inline Vector3 imageOf(const Linear& m, const Vector3& translation, const Vector3& point) {
+    Vector3 image;
+    for (std::size_t j = 0; j < 3; ++j)
+        image[j] = point[0] * m[0][j] + point[1] * m[1][j] + point[2] * m[2][j] + translation[j];
+    return image;
+}
 
-/// The node's evaluation state, emptied when the scene has changed since it was filled.
-NodeEvaluation& currentState(FbxNode& node) {
-    NodeEvaluation& state = node.evaluation();
-    const std::uint64_t revision = revisionOf(node);
-    if (!state.binding || state.revision != revision) {
-        node.GetFbxManager()->data().evaluationBudget.release(state);
-        state.binding = bindTransform(node);
-        state.revision = revision;
-        state.chain = NodeEvaluation::Chain::unknown;
+inline Linear transposed(const Linear& m) {
+    Linear result;
+    for (std::size_t i = 0; i < 3; ++i) {
+        for (std::size_t j = 0; j < 3; ++j)
+            result[i][j] = m[j][i];
     }
-    return state;
+    return result;
 }
 
-FbxVector4 valueAt(AnimatedProperty& property, const FbxTime& time, FbxEuler::EOrder order) {
-    const bool isStatic = time == FBXSDK_TIME_INFINITE || !property.animated();
-    const Components value = isStatic ? property.staticValue : evaluateAnimation(property, time, order);
-    return {value[0], value[1], value[2], 1.0};
-}
-
-LocalTransform localAt(TransformBinding& binding, const FbxTime& time) {
-    LocalTransform local;
-    const FbxVector4 translation = valueAt(binding.translation, time, binding.order);
-    const FbxVector4 angles = valueAt(binding.rotation, time, binding.order);
-    local.scaling = valueAt(binding.scaling, time, binding.order);
-    local.rotation = binding.preRotation * rotationMatrix(angles, binding.order) * binding.postRotationInverse;
-    local.translation = translation;
-    if (binding.hasPivots) {
-        // The image of the origin, from the right: Sp⁻¹, S, Sp, Soff, Rp⁻¹, rotation, Rp, Roff, T.
-        const FbxVector4& pivot = binding.scalingPivot;
-        FbxVector4 point;
-        for (int i = 0; i < 3; ++i) {
-            point[i] = pivot[i] - local.scaling[i] * pivot[i] + binding.scalingOffset[i] - binding.rotationPivot[i];
-        }
-        point = local.rotation.MultT(pointAt(point));
-        for (int i = 0; i < 3; ++i) {
-            local.translation[i] = translation[i] + binding.rotationOffset[i] + binding.rotationPivot[i] + point[i];
-        }
+/// Scales first, along the axes from which the matrix comes.
+inline Linear scaled(Linear m, const Vector3& scaling) {
+    for (std::size_t i = 0; i < 3; ++i) {
+        for (double& element : m[i])
+            element *= scaling[i];
     }
-    return local;
+    return m;
 }
 
-FbxAMatrix scaled(FbxAMatrix matrix, const FbxVector4& scaling) {
-    for (int row = 0; row < 3; ++row) {
-        for (int column = 0; column < 3; ++column)
-            matrix[row][column] *= scaling[row];
-    }
-    return matrix;
-}
-
-FbxAMatrix withoutTranslation(FbxAMatrix matrix) {
-    for (int column = 0; column < 3; ++column)
-        matrix[3][column] = 0.0;
-    return matrix;
-}
-
-/// The scale and shear that a parent hands on: its matrix with its pure rotation taken off.
-FbxAMatrix inheritedScale(const GlobalTransform& parent) {
-    return parent.rotation.Transpose() * withoutTranslation(parent.matrix);
-}
-
-FbxVector4 reciprocal(const FbxVector4& scaling) {
-    FbxVector4 result(1, 1, 1, 1);
-    for (int i = 0; i < 3; ++i)
+Vector3 reciprocal(const Vector3& scaling) {
+    Vector3 result;
+    for (std::size_t i = 0; i < 3; ++i)
         result[i] = scaling[i] != 0.0 ? 1.0 / scaling[i] : 1.0;
     return result;
 }
 
-/// The linear part of a global matrix; the three inherit types differ in where the parent's scale enters.
-FbxAMatrix linearPart(const GlobalTransform& parent, const LocalTransform& local, FbxTransform::EInheritType inherit) {
-    if (inherit == FbxTransform::eInheritRSrs) {
-        return withoutTranslation(parent.matrix) * scaled(local.rotation, local.scaling);
+void write(FbxAMatrix& matrix, const Linear& linear, const Vector3& translation) {
+    for (std::size_t i = 0; i < 3; ++i) {
+        for (std::size_t j = 0; j < 3; ++j)
+            matrix.mData[i].mData[j] = linear[i][j];
+        matrix.mData[3].mData[i] = translation[i];
     }
-    FbxAMatrix scale = inheritedScale(parent);
-    if (inherit == FbxTransform::eInheritRrs)
-        scale = scaled(scale, reciprocal(parent.scaling));
-    return parent.rotation * local.rotation * scaled(scale, local.scaling);
+}
+
+// ---- Binding: what is known of a node before it is asked for a time ----
+
+bool isZero(const FbxVector4& vector) { return vector[0] == 0.0 && vector[1] == 0.0 && vector[2] == 0.0; }
+
+Linear turnOf(const TransformBinding& binding, const Components& angles) {
+    const Linear turn = axesFromEuler(FbxVector4(angles[0], angles[1], angles[2]), binding.order);
+    return binding.preRotation * turn * binding.postRotationInverse;
+}
+
+LocalTransform localOf(const TransformBinding& binding, const Components& translation, const Linear& turn,
+                       const Components& scaling) {
+    LocalTransform local = {
+        turn, {translation[0], translation[1], translation[2]}, {scaling[0], scaling[1], scaling[2]}};
+    if (!binding.hasPivots)
+        return local;
+    // The image of the origin, from the right: Sp⁻¹, S, Sp, Soff, Rp⁻¹, rotation, Rp, Roff, T.
+    Vector3 point;
+    for (std::size_t i = 0; i < 3; ++i) {
+        const double pivot = binding.scalingPivot.mData[i];
+        point[i] = pivot - local.scaling[i] * pivot + binding.scalingOffset.mData[i] - binding.rotationPivot.mData[i];
+    }
+    point = imageOf(turn, {0.0, 0.0, 0.0}, point);
+    for (std::size_t i = 0; i < 3; ++i) {
+        local.translation[i] =
+            translation[i] + binding.rotationOffset.mData[i] + binding.rotationPivot.mData[i] + point[i];
+    }
+    return local;
+}
+
+Linear axesOf(const FbxVector4& degrees) { return axesFromEuler(degrees, FbxEuler::eOrderXYZ); }
+
+void bindTransform(FbxNode& node, NodeEvaluation& state) {
+    TransformBinding binding;
+    FbxScene* scene = node.GetScene();
+    FbxAnimStack* stack = scene ? scene->GetCurrentAnimationStack() : nullptr;
+    binding.translation = bindAnimation(node.LclTranslation, stack);
+    binding.rotation = bindAnimation(node.LclRotation, stack);
+    binding.scaling = bindAnimation(node.LclScaling, stack);
+
+    // Pre- and post-rotation and the order are in force only while rotation is active, and not for its limits alone.
+    binding.preRotation = binding.postRotationInverse = kIdentity;
+    if (node.GetRotationActive() && !node.GetRotationSpaceForLimitOnly(FbxNode::eSourcePivot)) {
+        binding.preRotation = axesOf(node.GetPreRotation(FbxNode::eSourcePivot));
+        binding.postRotationInverse = transposed(axesOf(node.GetPostRotation(FbxNode::eSourcePivot)));
+        node.GetRotationOrder(FbxNode::eSourcePivot, binding.order);
+    }
+    binding.rotationOffset = node.GetRotationOffset(FbxNode::eSourcePivot);
+    binding.rotationPivot = node.GetRotationPivot(FbxNode::eSourcePivot);
+    binding.scalingOffset = node.GetScalingOffset(FbxNode::eSourcePivot);
+    binding.scalingPivot = node.GetScalingPivot(FbxNode::eSourcePivot);
+    binding.hasPivots = !isZero(binding.rotationOffset) || !isZero(binding.rotationPivot) ||
+                        !isZero(binding.scalingOffset) || !isZero(binding.scalingPivot);
+
+    node.GetTransformationInheritType(state.inherit);
+    state.still = localOf(binding, binding.translation.staticValue, turnOf(binding, binding.rotation.staticValue),
+                          binding.scaling.staticValue);
+    const bool moves = binding.translation.animated() || binding.rotation.animated() || binding.scaling.animated();
+    state.animation = moves ? std::make_unique<TransformBinding>(std::move(binding)) : nullptr;
+}
+
+/// The node's evaluation state, emptied when the scene has changed since it was filled.
+NodeEvaluation& currentState(FbxNode& node) {
+    NodeEvaluation& state = node.evaluation();
+    ManagerData& manager = node.GetFbxManager()->data();
+    if (state.revision != manager.revision) {
+        manager.evaluationBudget.release(state);
+        bindTransform(node, state);
+        state.revision = manager.revision;
+        state.chain = NodeEvaluation::Chain::unknown;
+        state.hasStillGlobal = false;
+    }
+    return state;
+}
+
+// ---- Evaluation ----
+
+/// Of a property that is no rotation.
+Components valueAt(AnimatedProperty& property, const FbxTime& time) {
+    return property.animated() ? evaluateAnimation(property, time, FbxEuler::eOrderXYZ) : property.staticValue;
+}
+
+LocalTransform localAt(NodeEvaluation& state, const FbxTime& time) {
+    if (!state.animation || time == FBXSDK_TIME_INFINITE)
+        return state.still;
+    TransformBinding& binding = *state.animation;
+    const Linear turn = binding.rotation.animated()
+                            ? turnOf(binding, evaluateAnimation(binding.rotation, time, binding.order))
+                            : state.still.rotation;
+    return localOf(binding, valueAt(binding.translation, time), turn, valueAt(binding.scaling, time));
+}
+
+/// The linear part of a global matrix; the three inherit types differ in where the parent's scale enters. A node that
+/// compensates for its parent's scaling does so before its own rotation.
+Linear linearPart(const GlobalTransform& parent, const LocalTransform& local, const Linear& rotation,
+                  FbxTransform::EInheritType inherit) {
+    switch (inherit) {
+    case FbxTransform::eInheritRSrs:
+        return parent.matrix * scaled(local.rotation, local.scaling);
+    case FbxTransform::eInheritRrs:
+        return scaled(parent.matrix, reciprocal(parent.scaling)) * scaled(local.rotation, local.scaling);
+    case FbxTransform::eInheritRrSs:
+        break;
+    }
+    // The scale and shear that the parent hands on: its matrix with its pure rotation taken off.
+    const Linear scale = transposed(parent.rotation) * parent.matrix;
+    return rotation * scaled(scale, local.scaling);
 }
 
 GlobalTransform combine(const GlobalTransform* parent, const LocalTransform& local,
                         FbxTransform::EInheritType inherit) {
-    GlobalTransform global;
-    global.scaling = local.scaling;
-    FbxVector4 translation = local.translation;
-    if (parent) {
-        global.matrix = linearPart(*parent, local, inherit);
-        global.rotation = parent->rotation * local.rotation;
-        translation = parent->matrix.MultT(pointAt(local.translation));
-    } else {
-        global.matrix = scaled(local.rotation, local.scaling);
-        global.rotation = local.rotation;
-    }
-    for (int i = 0; i < 3; ++i)
-        global.matrix[3][i] = translation[i];
-    return global;
+    if (!parent)
+        return {scaled(local.rotation, local.scaling), local.translation, local.rotation, local.scaling};
+    const Linear rotation = parent->rotation * local.rotation;
+    return {linearPart(*parent, local, rotation, inherit),
+            imageOf(parent->matrix, parent->translation, local.translation), rotation, local.scaling};
 }
 
-/// Where the time stands in the cache, or would stand; sequential questions are answered without a search.
-std::size_t placeOf(NodeEvaluation& state, std::int64_t ticks) {
-    const auto& times = state.times;
-    if (!times.empty() && times.back() < ticks)
-        return times.size();
-    for (std::size_t step = 0; step < 2; ++step) {
-        const std::size_t index = state.cursor + step;
-        if (index < times.size() && times[index] == ticks)
-            return index;
-    }
-    return static_cast<std::size_t>(std::lower_bound(times.begin(), times.end(), ticks) - times.begin());
-}
-
-const GlobalTransform* cached(NodeEvaluation& state, std::int64_t ticks) {
-    const std::size_t place = placeOf(state, ticks);
-    if (place >= state.times.size() || state.times[place] != ticks)
-        return nullptr;
-    state.cursor = place;
-    return &state.transforms[place];
-}
-
-void makeRoom(EvaluationBudget& budget, const NodeEvaluation& keep) {
-    while (budget.transforms >= kMaximumCachedTransforms) {
-        NodeEvaluation* oldest = nullptr;
-        for (NodeEvaluation* holder : budget.holders) {
-            if (holder != &keep && (!oldest || holder->lastUse < oldest->lastUse))
-                oldest = holder;
-        }
-        if (!oldest)
-            return;
-        budget.release(*oldest);
-    }
-}
-
-void store(EvaluationBudget& budget, NodeEvaluation& state, std::int64_t ticks, const GlobalTransform& transform) {
-    makeRoom(budget, state);
-    if (budget.transforms >= kMaximumCachedTransforms)
-        budget.release(state);
-    if (state.times.empty()) {
-        budget.holders.push_back(&state);
-        state.times.swap(budget.spareTimes);
-        state.transforms.swap(budget.spareTransforms);
-    }
-    const std::size_t place = placeOf(state, ticks);
-    state.times.insert(state.times.begin() + static_cast<std::ptrdiff_t>(place), ticks);
-    state.transforms.insert(state.transforms.begin() + static_cast<std::ptrdiff_t>(place), transform);
-    state.cursor = place;
-    state.lastUse = ++budget.clock;
-    ++budget.transforms;
-}
-
-/// True when neither the node nor an ancestor is animated: then it has one transform for every time.
-bool isStaticChain(FbxNode& node) {
+/// Finds out for the node and its ancestors which of them nothing animates, themselves or above: those have one
+/// transform for every time.
+NodeEvaluation& stateWithChain(FbxNode& node) {
+    NodeEvaluation& asked = currentState(node);
+    if (asked.chain != NodeEvaluation::Chain::unknown)
+        return asked;
     std::vector<FbxNode*> unknown;
     bool isStatic = true;
     for (FbxNode* each = &node; each; each = each->GetParent()) {
@@ -238,77 +224,167 @@ bool isStaticChain(FbxNode& node) {
     }
     for (auto each = unknown.rbegin(); each != unknown.rend(); ++each) {
         NodeEvaluation& state = (*each)->evaluation();
-        isStatic = isStatic && !state.binding->animated;
+        isStatic = isStatic && !state.animation;
         state.chain = isStatic ? NodeEvaluation::Chain::isStatic : NodeEvaluation::Chain::animated;
     }
-    return isStatic;
+    return asked;
 }
 
-GlobalTransform globalAt(FbxNode& node, FbxTime time) {
-    EvaluationBudget& budget = node.GetFbxManager()->data().evaluationBudget;
-    if (isStaticChain(node))
-        time = FBXSDK_TIME_INFINITE;
-    const std::int64_t ticks = time.Get();
+/// Where a way up through the tree ends: at a node that knows its transform, or above the root.
+const GlobalTransform* knownTransform(NodeEvaluation& state, EvaluationBudget& budget, std::uint64_t number) {
+    return state.hasStillGlobal ? &state.stillGlobal : budget.find(state, number);
+}
 
-    // Up to the nearest ancestor that knows the answer, then down again.
+/// Up to the nearest ancestor that knows the answer, then down again. Of nodes that stand still the answer holds for
+/// all times.
+GlobalTransform globalAt(FbxNode& node, const FbxTime& time) {
+    EvaluationBudget& budget = node.GetFbxManager()->data().evaluationBudget;
+    NodeEvaluation& asked = stateWithChain(node);
+    if (asked.hasStillGlobal)
+        return asked.stillGlobal;
+    const bool moves = asked.chain == NodeEvaluation::Chain::animated;
+    const std::uint64_t number = moves ? budget.times.numberOf(time.Get()) : 0;
+
     std::vector<FbxNode*>& path = budget.path;
     path.clear();
     GlobalTransform transform;
-    bool known = false;
+    const GlobalTransform* known = nullptr;
     for (FbxNode* each = &node; each && !known; each = each->GetParent()) {
-        NodeEvaluation& state = currentState(*each);
-        if (const GlobalTransform* found = cached(state, ticks)) {
-            state.lastUse = ++budget.clock;
-            transform = *found;
-            known = true;
-        } else {
+        known = knownTransform(each->evaluation(), budget, number);
+        if (!known)
             path.push_back(each);
-        }
     }
     for (auto each = path.rbegin(); each != path.rend(); ++each) {
         NodeEvaluation& state = (*each)->evaluation();
-        const LocalTransform local = localAt(*state.binding, time);
-        transform = combine(known ? &transform : nullptr, local, state.binding->inherit);
-        known = true;
-        if ((*each)->GetChildCount() > 0 || ticks == FBXSDK_TIME_INFINITE.Get())
-            store(budget, state, ticks, transform);
+        transform = combine(known, localAt(state, time), state.inherit);
+        known = &transform;
+        if (state.chain == NodeEvaluation::Chain::isStatic) {
+            state.stillGlobal = transform;
+            state.hasStillGlobal = true;
+        } else if ((*each)->GetChildCount() > 0) {
+            budget.store(state, number, transform);
+        }
     }
-    return transform;
+    return path.empty() ? *known : transform;
 }
 
 } // namespace
 
+// ---- Caches ----
+
+const GlobalTransform* TransformCache::find(std::uint64_t number) {
+    if (mEntries.empty())
+        return nullptr;
+    Entry& entry = placeOf(number);
+    if (entry.number != number || !isOurs(entry))
+        return nullptr;
+    entry.wasFound = true;
+    return &entry.transform;
+}
+
+void TransformCache::store(std::uint64_t number, const GlobalTransform& transform, std::uint64_t newest) {
+    constexpr std::size_t kFirstPlaces = 8;
+    if (mEntries.empty())
+        mEntries.resize(kFirstPlaces);
+    const auto isNeeded = [&](const Entry& entry) {
+        return isOurs(entry) && entry.number != number && !entry.wasFound && newest - entry.number < TimeNumbers::kKept;
+    };
+    while (isNeeded(placeOf(number)) && mEntries.size() < TimeNumbers::kKept)
+        grow();
+    Entry& entry = placeOf(number);
+    mUsed += isOurs(entry) ? 0U : 1U;
+    entry = {number, mGeneration, false, transform};
+}
+
+void TransformCache::grow() {
+    std::vector<Entry> old = std::move(mEntries);
+    mEntries.clear();
+    mEntries.resize(old.size() * 2);
+    for (const Entry& entry : old) {
+        if (isOurs(entry))
+            placeOf(entry.number) = entry;
+    }
+}
+
+void TransformCache::reset(TransformCache&& memory, std::uint32_t generation) {
+    mEntries = std::move(memory.mEntries);
+    memory.mEntries.clear();
+    mGeneration = generation;
+    mUsed = 0;
+}
+
 NodeEvaluation::NodeEvaluation() = default;
 NodeEvaluation::~NodeEvaluation() = default;
 
+const GlobalTransform* EvaluationBudget::find(NodeEvaluation& evaluation, std::uint64_t number) {
+    const GlobalTransform* found = evaluation.cache.find(number);
+    if (found)
+        use(evaluation);
+    return found;
+}
+
+void EvaluationBudget::store(NodeEvaluation& evaluation, std::uint64_t number, const GlobalTransform& transform) {
+    if (evaluation.cache.places() == 0) {
+        evaluation.cache.reset(std::move(mSpare), ++mGeneration);
+        mPlaces += evaluation.cache.places();
+    }
+    const std::size_t before = evaluation.cache.places();
+    evaluation.cache.store(number, transform, times.newest());
+    mPlaces += evaluation.cache.places() - before;
+    use(evaluation);
+    while (mPlaces > kMostPlaces && mOldest != &evaluation)
+        release(*mOldest);
+}
+
 void EvaluationBudget::release(NodeEvaluation& evaluation) {
-    if (evaluation.times.empty())
+    if (evaluation.cache.places() == 0)
         return;
-    transforms -= evaluation.times.size();
-    std::erase(holders, &evaluation);
-    spareTimes = std::move(evaluation.times);
-    spareTransforms = std::move(evaluation.transforms);
-    spareTimes.clear();
-    spareTransforms.clear();
-    evaluation.times.clear();
-    evaluation.transforms.clear();
-    evaluation.cursor = 0;
+    mPlaces -= evaluation.cache.places();
+    unlink(evaluation);
+    mSpare = std::move(evaluation.cache);
+    evaluation.cache = {};
+}
+
+/// Moves the node to the front of the list.
+void EvaluationBudget::use(NodeEvaluation& evaluation) {
+    if (mLatest == &evaluation)
+        return;
+    unlink(evaluation);
+    evaluation.nextUsed = mLatest;
+    (mLatest ? mLatest->previousUsed : mOldest) = &evaluation;
+    mLatest = &evaluation;
+}
+
+void EvaluationBudget::unlink(NodeEvaluation& evaluation) {
+    if (mLatest == &evaluation)
+        mLatest = evaluation.nextUsed;
+    if (mOldest == &evaluation)
+        mOldest = evaluation.previousUsed;
+    if (evaluation.previousUsed)
+        evaluation.previousUsed->nextUsed = evaluation.nextUsed;
+    if (evaluation.nextUsed)
+        evaluation.nextUsed->previousUsed = evaluation.previousUsed;
+    evaluation.nextUsed = evaluation.previousUsed = nullptr;
 }
 
 FbxAMatrix evaluateLocal(FbxNode& node, const FbxTime& time) {
-    const LocalTransform local = localAt(*currentState(node).binding, time);
-    FbxAMatrix matrix = scaled(local.rotation, local.scaling);
-    for (int i = 0; i < 3; ++i)
-        matrix[3][i] = local.translation[i];
+    const LocalTransform local = localAt(currentState(node), time);
+    FbxAMatrix matrix;
+    write(matrix, scaled(local.rotation, local.scaling), local.translation);
     return matrix;
 }
 
-FbxAMatrix evaluateGlobal(FbxNode& node, const FbxTime& time) { return globalAt(node, time).matrix; }
+void evaluateGlobal(FbxNode& node, const FbxTime& time, FbxAMatrix& matrix) {
+    const GlobalTransform global = globalAt(node, time);
+    write(matrix, global.matrix, global.translation);
+}
 
 } // namespace detail
 
 FbxAMatrix& FbxNode::EvaluateGlobalTransform(FbxTime pTime, FbxNode::EPivotSet, bool, bool) {
-    return evaluation().global = detail::evaluateGlobal(*this, pTime);
+    FbxAMatrix& global = evaluation().global;
+    detail::evaluateGlobal(*this, pTime, global);
+    return global;
 }
 
 FbxAMatrix& FbxNode::EvaluateLocalTransform(FbxTime pTime, FbxNode::EPivotSet, bool, bool) {

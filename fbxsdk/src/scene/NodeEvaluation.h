@@ -7,22 +7,70 @@
 //   global = the parent's, with the parent's scale entering as the node's inherit type says
 #pragma once
 
+#include <array>
 #include <cstdint>
 #include <memory>
 #include <vector>
 
 #include <fbxsdk/FbxAMatrix.h>
 #include <fbxsdk/FbxTime.h>
+#include <fbxsdk/FbxTransform.h>
+
+#include "scene/TimeNumbers.h"
 
 FBXSDK_NAMESPACE_BEGIN
 class FbxNode;
 namespace detail {
 
+using Vector3 = std::array<double, 3>;
+/// The images of the three axes, as the first rows of an FbxAMatrix hold them.
+using Linear = std::array<Vector3, 3>;
+
+/// A node's own transform at one time, taken apart.
+struct LocalTransform {
+    Linear rotation;     ///< Rpre R Rpost⁻¹
+    Vector3 translation; ///< the translation column of the local matrix, pivots included
+    Vector3 scaling;
+};
+
 /// What a node's global transform hands on to its children.
 struct GlobalTransform {
-    FbxAMatrix matrix;
-    FbxAMatrix rotation;            ///< the pure rotation accumulated from the root
-    FbxVector4 scaling{1, 1, 1, 1}; ///< the node's own local scaling
+    Linear matrix;
+    Vector3 translation;
+    Linear rotation; ///< the pure rotation accumulated from the root
+    Vector3 scaling; ///< the node's own local scaling
+};
+
+/// Global transforms of one node by the numbers of their times (see TimeNumbers).
+///
+/// A number has one place. When another one stands there that can still be asked for and was not found yet, the list
+/// grows; any other gives way. So a host that asks node after node for all times finds all of them, and one that takes
+/// the times in portions needs room for a portion only.
+class TransformCache {
+public:
+    [[nodiscard]] const GlobalTransform* find(std::uint64_t number);
+    /// `newest` is the number that was given last; those too far behind are forgotten.
+    void store(std::uint64_t number, const GlobalTransform& transform, std::uint64_t newest);
+    /// Forgets everything and takes over the memory of another cache. `generation` was given to none of the caches that
+    /// the memory belonged to.
+    void reset(TransformCache&& memory, std::uint32_t generation);
+    [[nodiscard]] std::size_t places() const { return mEntries.size(); }
+    [[nodiscard]] std::size_t used() const { return mUsed; } ///< places that hold a transform
+
+private:
+    struct Entry {
+        std::uint64_t number = 0;
+        std::uint32_t generation = 0; ///< of the cache that stored it
+        bool wasFound = false;
+        GlobalTransform transform{};
+    };
+    [[nodiscard]] Entry& placeOf(std::uint64_t number) { return mEntries[number & (mEntries.size() - 1)]; }
+    [[nodiscard]] bool isOurs(const Entry& entry) const { return entry.generation == mGeneration; }
+    void grow();
+
+    std::vector<Entry> mEntries; ///< a power of two of them, or none
+    std::uint32_t mGeneration = 0;
+    std::size_t mUsed = 0;
 };
 
 struct TransformBinding;
@@ -34,35 +82,51 @@ struct NodeEvaluation {
 
     FbxAMatrix local, global; ///< what EvaluateLocalTransform and EvaluateGlobalTransform return references to
 
-    std::uint64_t revision = 0; ///< of the manager, when what follows was filled
-    std::unique_ptr<TransformBinding> binding;
+    std::uint64_t revision = UINT64_MAX;         ///< of the manager, when what follows was filled
+    LocalTransform still{};                      ///< of the static values
+    std::unique_ptr<TransformBinding> animation; ///< null when nothing animates the node itself
+    FbxTransform::EInheritType inherit = FbxTransform::eInheritRrSs;
+
     enum class Chain : std::uint8_t { unknown, isStatic, animated };
-    Chain chain = Chain::unknown;            ///< whether the node or any ancestor is animated
-    std::vector<std::int64_t> times;         ///< ascending ticks
-    std::vector<GlobalTransform> transforms; ///< one per time
-    std::size_t cursor = 0;
-    std::uint64_t lastUse = 0;
+    Chain chain = Chain::unknown; ///< whether the node or any ancestor is animated
+    bool hasStillGlobal = false;
+    GlobalTransform stillGlobal{}; ///< of a node that is static, and so are its ancestors
+
+    TransformCache cache; ///< of a node that has children and moves
+    // The list of nodes whose cache holds something, from the one asked last on.
+    NodeEvaluation* nextUsed = nullptr;
+    NodeEvaluation* previousUsed = nullptr;
 };
 
-/// The nodes of one manager that hold cached transforms, and how many there are in all.
-struct EvaluationBudget {
-    std::vector<NodeEvaluation*> holders;
-    std::size_t transforms = 0;
-    std::uint64_t clock = 0;
+/// The nodes of one manager that hold cached transforms, and how many places they take in all.
+class EvaluationBudget {
+public:
+    /// The transforms of all caches, in places of about 200 bytes each: 13 MiB.
+    static constexpr std::size_t kMostPlaces = std::size_t{1} << 16U;
 
-    // The memory of the node that was released last, for the next one: most have as many transforms.
-    std::vector<std::int64_t> spareTimes;
-    std::vector<GlobalTransform> spareTransforms;
-
+    TimeNumbers times;
     std::vector<FbxNode*> path; ///< of one evaluation; here to keep its memory
 
+    [[nodiscard]] const GlobalTransform* find(NodeEvaluation& evaluation, std::uint64_t number);
+    void store(NodeEvaluation& evaluation, std::uint64_t number, const GlobalTransform& transform);
     void release(NodeEvaluation& evaluation);
+    [[nodiscard]] std::size_t places() const { return mPlaces; }
+
+private:
+    void use(NodeEvaluation& evaluation);
+    void unlink(NodeEvaluation& evaluation);
+
+    NodeEvaluation* mLatest = nullptr;
+    NodeEvaluation* mOldest = nullptr;
+    std::size_t mPlaces = 0;
+    std::uint32_t mGeneration = 0; ///< that was given last
+    TransformCache mSpare;         ///< of the node that was released last, for the next one: most need as much memory
 };
 
 /// The node's matrix relative to its parent, at the time (or of the static values at FBXSDK_TIME_INFINITE).
 FbxAMatrix evaluateLocal(FbxNode& node, const FbxTime& time);
 /// The node's matrix in the world.
-FbxAMatrix evaluateGlobal(FbxNode& node, const FbxTime& time);
+void evaluateGlobal(FbxNode& node, const FbxTime& time, FbxAMatrix& matrix);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

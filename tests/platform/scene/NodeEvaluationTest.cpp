@@ -3,8 +3,10 @@
 //
 // Transforms of nodes: each term of the local matrix, the three inherit types, random trees against plain textbook
 // matrices, and the cache.
+#include <algorithm>
 #include <array>
 #include <limits>
+#include <random>
 #include <string>
 #include <vector>
 
@@ -250,6 +252,17 @@ TEST_F(InheritTypeTest, RrsKeepsTheScalingThatTheParentInherits) {
     expectColumns({0, 15, 0}, {-5, 0, 0}, {100, 0, 0}, 5);
 }
 
+// The grandparent's scaling of (5, 1, 1) reaches the child through its parent. The child is turned by 90° about Z:
+// taken before its turn, what is handed on stretches along the world's x, so the child's own y, which points there.
+TEST_F(InheritTypeTest, RrsCompensatesBeforeTheNodesOwnTurn) {
+    build(FbxTransform::eInheritRrs);
+    FbxNode* top = addNode("top");
+    top->LclScaling.Set(FbxDouble3(5, 1, 1));
+    top->AddChild(parent);
+
+    expectColumns({0, 3, 0}, {-5, 0, 0}, {100, 0, 0});
+}
+
 TEST_F(InheritTypeTest, OfANodeBelowTheRootMakesNoDifference) {
     for (const auto type : {FbxTransform::eInheritRrSs, FbxTransform::eInheritRSrs, FbxTransform::eInheritRrs}) {
         FbxNode* node = addNode();
@@ -353,7 +366,7 @@ TEST_F(NodeEvaluationTest, AgreesWithPlainMatricesOverAThousandTrees) {
             if (source.inherit == FbxTransform::eInheritRSrs)
                 result = plain::linear(global * local);
             if (source.inherit == FbxTransform::eInheritRrs)
-                result = turn * source.turn() * inherited * plain::inverse(parentScaling) * own;
+                result = plain::linear(global) * plain::inverse(parentScaling) * source.turn() * own;
             const plain::Matrix placed = global * local;
             for (std::size_t i = 0; i < 3; ++i)
                 result.at[i][3] = placed.at[i][3];
@@ -579,9 +592,9 @@ TEST_F(CacheInvalidationTest, AsksAnAncestorOncePerTime) {
         globalX(leaf, seconds(0.5));
     }
 
-    EXPECT_EQ(parent->evaluation().times.size(), 2U);
-    EXPECT_EQ(child->evaluation().times.size(), 2U);
-    EXPECT_TRUE(leaf->evaluation().times.empty()); // nobody asks a leaf's transform for another node
+    EXPECT_EQ(parent->evaluation().cache.used(), 2U);
+    EXPECT_EQ(child->evaluation().cache.used(), 2U);
+    EXPECT_EQ(leaf->evaluation().cache.places(), 0U); // nobody asks a leaf's transform for another node
 }
 
 TEST_F(CacheInvalidationTest, KeepsOneTransformForAllTimesWhereNothingMoves) {
@@ -590,22 +603,24 @@ TEST_F(CacheInvalidationTest, KeepsOneTransformForAllTimesWhereNothingMoves) {
     for (int i = 0; i < 100; ++i)
         globalX(leaf, seconds(i));
 
-    EXPECT_EQ(still->evaluation().times.size(), 1U);
-    EXPECT_EQ(leaf->evaluation().times.size(), 1U);
+    EXPECT_TRUE(still->evaluation().hasStillGlobal);
+    EXPECT_TRUE(leaf->evaluation().hasStillGlobal);
+    EXPECT_EQ(manager->data().evaluationBudget.places(), 0U);
 }
 
 TEST_F(CacheInvalidationTest, CountsWhatItHoldsAndGivesItBack) {
     const detail::EvaluationBudget& budget = manager->data().evaluationBudget;
     keys(parent->LclTranslation, layer, "X", {{0, 0}, {1, 1}});
+    addNode("leaf", child);
     for (int i = 0; i < 10; ++i)
         globalX(child, seconds(i));
-    EXPECT_EQ(budget.transforms, 20U); // the root's and the parent's; the root is static and yet asked by time
-    EXPECT_EQ(budget.holders.size(), 2U);
+    EXPECT_EQ(parent->evaluation().cache.used(), 10U);
+    EXPECT_EQ(budget.places(), parent->evaluation().cache.places() + child->evaluation().cache.places());
 
+    const std::size_t ofChild = child->evaluation().cache.places();
     parent->Destroy();
 
-    EXPECT_EQ(budget.transforms, 10U);
-    EXPECT_EQ(budget.holders.size(), 1U);
+    EXPECT_EQ(budget.places(), ofChild);
 }
 
 TEST_F(CacheInvalidationTest, HandsTheMemoryOfReleasedTransformsToTheNextNode) {
@@ -616,17 +631,102 @@ TEST_F(CacheInvalidationTest, HandsTheMemoryOfReleasedTransformsToTheNextNode) {
     keys(other->LclTranslation, layer, "X", {{0, 0}, {1, 1}});
     for (int i = 0; i < 100; ++i)
         globalX(parent, seconds(i));
+    const std::size_t places = parent->evaluation().cache.places();
+    ASSERT_GE(places, 100U);
 
     budget.release(parent->evaluation());
-    EXPECT_EQ(parent->evaluation().times.capacity(), 0U);
-    EXPECT_EQ(parent->evaluation().transforms.capacity(), 0U);
-    EXPECT_GE(budget.spareTransforms.capacity(), 100U);
-    const auto* const memory = budget.spareTransforms.data();
-    for (int i = 0; i < 100; ++i)
-        EXPECT_EQ(globalX(other, seconds(i)), i < 1 ? 0.0 : 1.0) << i;
+    EXPECT_EQ(parent->evaluation().cache.places(), 0U);
+    EXPECT_EQ(globalX(other, seconds(0)), 0.0);
 
-    EXPECT_EQ(other->evaluation().transforms.data(), memory);
-    EXPECT_EQ(other->evaluation().times.size(), 100U);
+    EXPECT_EQ(other->evaluation().cache.places(), places);
+    EXPECT_EQ(other->evaluation().cache.used(), 1U);
+    for (int i = 1; i < 100; ++i)
+        EXPECT_EQ(globalX(other, seconds(i)), 1.0) << i;
+    EXPECT_EQ(other->evaluation().cache.places(), places);
+}
+
+TEST_F(CacheInvalidationTest, StaysWithinItsBudgetHoweverManyNodesAndTimes) {
+    keys(parent->LclTranslation, layer, "X", {{0, 0}, {1, 1}});
+    FbxNode* node = child;
+    for (int i = 0; i < 40; ++i)
+        node = addNode("n", node);
+    const detail::EvaluationBudget& budget = manager->data().evaluationBudget;
+
+    for (int i = 0; i < 20'000; ++i)
+        globalX(node, FbxTime(i));
+    EXPECT_LE(budget.places(), detail::EvaluationBudget::kMostPlaces);
+
+    // After that everything is as in a scene that was never asked.
+    EXPECT_EQ(globalX(node, seconds(1)), 11.0);
+    EXPECT_EQ(globalX(child, seconds(0)), 10.0);
+}
+
+/// A chain whose first node moves, asked node after node for the times of a list.
+class LongChainTest : public NodeEvaluationTest {
+protected:
+    LongChainTest() {
+        FbxAnimLayer* layer = addStack(*scene);
+        for (int i = 0; i < 20; ++i) // not more than the caches hold at 2,000 times each
+            chain.push_back(addNode("n", chain.empty() ? nullptr : chain.back()));
+        keys(chain.front()->LclTranslation, layer, "X", {{0, 0}, {2000, 2000}});
+    }
+    void readAll(const std::vector<FbxTime>& times) {
+        for (FbxNode* node : chain) {
+            for (const FbxTime& time : times)
+                EXPECT_NEAR(globalX(node, time), time.GetSecondDouble(), 1e-3);
+        }
+    }
+    static std::vector<FbxTime> ascending(int count) {
+        std::vector<FbxTime> times;
+        for (int i = 0; i < count; ++i)
+            times.push_back(seconds(i * 0.25));
+        return times;
+    }
+
+    std::vector<FbxNode*> chain;
+};
+
+TEST_F(LongChainTest, FindsEveryTimeOfTheParentWhateverTheirOrder) {
+    std::vector<FbxTime> times = ascending(2000);
+    for (int order = 0; order < 3; ++order) {
+        if (order == 1)
+            std::reverse(times.begin(), times.end());
+        if (order == 2)
+            std::shuffle(times.begin(), times.end(), std::minstd_rand(7));
+        readAll(times);
+        for (std::size_t i = 0; i + 1 < chain.size(); ++i)
+            EXPECT_EQ(chain[i]->evaluation().cache.used(), times.size()) << "order " << order << ", node " << i;
+        chain.front()->LclRotation.Set(FbxDouble3(0, 0, order)); // all anew
+        chain.front()->LclRotation.Set(FbxDouble3(0, 0, 0));
+    }
+}
+
+TEST_F(LongChainTest, NeedsRoomForOnePortionWhereTimesAreTakenInPortions) {
+    const std::vector<FbxTime> times = ascending(4096);
+    constexpr std::size_t kPortion = 64;
+    for (std::size_t start = 0; start < times.size(); start += kPortion) {
+        readAll({times.begin() + static_cast<std::ptrdiff_t>(start),
+                 times.begin() + static_cast<std::ptrdiff_t>(start + kPortion)});
+    }
+
+    for (std::size_t i = 0; i + 1 < chain.size(); ++i)
+        EXPECT_LE(chain[i]->evaluation().cache.places(), 2 * kPortion) << i;
+}
+
+TEST(TimeNumbers, GoUpByOneAndAreForgottenInTheirOrder) {
+    detail::TimeNumbers numbers;
+    EXPECT_EQ(numbers.numberOf(50), 0U);
+    EXPECT_EQ(numbers.numberOf(10), 1U);
+    EXPECT_EQ(numbers.numberOf(50), 0U);
+    EXPECT_EQ(numbers.numberOf(10), 1U);
+    EXPECT_EQ(numbers.newest(), 1U);
+
+    constexpr auto kKept = static_cast<std::int64_t>(detail::TimeNumbers::kKept);
+    for (std::int64_t i = 0; i < kKept - 1; ++i)
+        EXPECT_EQ(numbers.numberOf(1000 + i), static_cast<std::uint64_t>(2 + i));
+    EXPECT_EQ(numbers.numberOf(10), 1U);
+    EXPECT_EQ(numbers.numberOf(50), detail::TimeNumbers::kKept + 1); // it was the oldest one
+    EXPECT_EQ(numbers.numberOf(1000), 2U);
 }
 
 TEST_F(NodeEvaluationTest, WalksAChainOfTenThousandWithoutRecursion) {
