@@ -28,9 +28,12 @@ namespace Tarnell::Fbx {
 
 namespace detail {
 class FrameTimes;
+class GlobalSampler;
 class MemoryAccount;
 class ObjectWarnings;
 class PropertySampler;
+class ReadScope;
+class SampleAccount;
 } // namespace detail
 
 /// One scene, and what can be read from it or written into it.
@@ -43,6 +46,8 @@ class PropertySampler;
 /// found nothing, a mesh without deformers) leaves it alone. Scene objects are passed as pointers of the platform and
 /// stay the scene's.
 class TARNELL_FBX_API FbxSdk {
+    friend class detail::ReadScope;
+
 public:
     static const std::string kMayaVertexCacheFileExtension; ///< ".xml"
     static const std::string kMaxVertexCacheFileExtension;  ///< ".pc2"
@@ -97,7 +102,8 @@ public:
     /// "Default Layer").
     void initCreateAnimationStack();
 
-    /// Selects the animation stack of exactly that name; false when there is none, and the selection stays.
+    /// Selects the animation stack of exactly that name, of which everything is read and evaluated from then on; false
+    /// when there is none, and the selection stays.
     bool setCurrentAnimationStack(const std::string& name);
 
     /// Replaces `names` by the names of all animation stacks, in the scene's order. False without a scene.
@@ -147,15 +153,9 @@ public:
     // for a single name. False for a null array, a count below 1, without a context or scene, and when there are more
     // objects than elements; what was filled until then stays. Elements without an object stay as they are.
     //
-    // Animated channels get one sample for every whole frame. A channel of more than `kMaxSamplesPerChannel` frames
-    // gets its static value only, and so does every channel once a list holds `kMaxSamplesPerList` samples.
-
-    static constexpr std::int64_t kMaxSamplesPerChannel = std::int64_t{1} << 24;
-    static constexpr std::int64_t kMaxSamplesPerList = std::int64_t{1} << 29;
-    // A list read from a file holds at most this many samples (48 MiB), and so many more for every byte of the file: a
-    // few bytes that claim an endless animation cost no more memory than a file that has one.
-    static constexpr std::int64_t kSamplesOfAnyFile = std::int64_t{12} << 20;
-    static constexpr std::int64_t kSamplesPerFileByte = 192;
+    // Animated channels get one sample for every whole frame; where all are equal they take the memory of one. False
+    // also when the samples of a list would take more than `memoryLimit()`: `lastError()` says over which frames they
+    // were asked for and how much they would have needed. Channels that got none are not animated then.
 
     bool getMeshes(TnFbxReadInfo& info, TnFbxMesh* meshes, int count);
     bool getCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count); ///< The producer cameras first.
@@ -195,9 +195,9 @@ public:
     // ---- Reading one node ----
     //
     // `time` is the range to sample, `global` asks for transforms in the world, and with `useSampleFPS` the key frames
-    // are converted to `sampleFPS`. `geometric` is the node's geometric transform. False for a null node and for one
-    // without the attribute that the object is read from; the object keeps what was set before. Channels that the scene
-    // says nothing about keep what they held.
+    // are converted to `sampleFPS`. `geometric` is the node's geometric transform. False for a null node, for one
+    // without the attribute that the object is read from, and when its samples would take more than `memoryLimit()`;
+    // the object keeps what was set before. Channels that the scene says nothing about keep what they held.
 
     bool getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                       TnFbxTransform& transform, fbxsdk::FbxAMatrix& geometric);
@@ -229,8 +229,9 @@ public:
     // ---- Transforms ----
 
     /// Position, rotation (degrees) and scale in the world, one value per frame of `time`. Lights that shine along an
-    /// axis are turned by −90° about X. A range over the sampling limits gives the values of its first frame alone.
-    /// False, with empty vectors, when the range is empty or the node null.
+    /// axis are turned by −90° about X.
+    /// False, with empty vectors, when the range is empty, the node null, or the values would take more than
+    /// `memoryLimit()`.
     bool getGlobalPositionRotationScaleValues(TnFbxTime& time, fbxsdk::FbxNode* node, fbxsdk::FbxAMatrix& geometric,
                                               std::vector<float>& positionX, std::vector<float>& positionY,
                                               std::vector<float>& positionZ, std::vector<float>& rotationX,
@@ -380,10 +381,14 @@ private:
                        detail::ObjectWarnings& warnings);
     template <class Object>
     bool readList(TnFbxReadInfo& info, Object* objects, int count);
+    template <class Walk>
+    bool walkSubtree(const Walk& walk, fbxsdk::FbxNode* top);
     bool readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count, int& index);
     bool getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node, TnFbxCamera& camera,
                          fbxsdk::FbxAMatrix& geometric, detail::PropertySampler& sampler);
     void setLookAtRotation(TnFbxCamera& camera);
+    void storeGlobalTransform(const TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxAMatrix& geometric,
+                              TnFbxTransform& transform);
     void setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& source,
                           const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh);
     detail::PropertySampler sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS);
@@ -393,11 +398,12 @@ private:
     fbxsdk::FbxManager* mManager = nullptr; // owned
     fbxsdk::FbxScene* mScene = nullptr;     // the manager's
     fbxsdk::FbxAnimStack* mCurrentAnimStack = nullptr;
-    std::int64_t mSamplesLeft;                      // of a list's share; without an end outside of lists
-    std::int64_t mSamplesOfFiles = 0;               // that a list may hold; 0: no file was loaded
-    std::string mFileName;                          // of the file that was loaded last; empty: none
-    std::unique_ptr<detail::MemoryAccount> mMemory; // of the list that is being read
+    std::string mFileName;                           // of the file that was loaded last; empty: none
+    std::unique_ptr<detail::MemoryAccount> mMemory;  // of the call that is reading
+    std::unique_ptr<detail::SampleAccount> mSamples; // the same, as far as samples go
+    std::unique_ptr<detail::GlobalSampler> mGlobals; // of the subtree that is being walked; null: none
     std::unique_ptr<detail::FrameTimes> mFrameTimes;
+    bool mIsReading = false;
 };
 
 } // namespace Tarnell::Fbx

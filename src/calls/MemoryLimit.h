@@ -17,6 +17,9 @@ public:
     void begin();
     /// False when the bytes counted so far, these included, are more than the limit.
     bool take(std::uint64_t bytes);
+    /// Of bytes that were granted and turned out not to be needed.
+    void giveBack(std::uint64_t bytes) { mNeeded -= bytes; }
+    std::uint64_t limit() const { return mLimit; }
     bool exceeded() const { return mNeeded > mLimit; }
     /// "12.3 GiB of samples and points would be needed, and the limit is 8.0 GiB".
     std::string describe() const;

@@ -4,7 +4,9 @@
 // Cameras: placement, aim, lens and film of a node's camera attribute, sampled, and of a producer camera, as it stands.
 #include "FbxSdk.h"
 
+#include "GlobalSampler.h"
 #include "PropertySampling.h"
+#include "ReadScope.h"
 #include "calls/LastError.h"
 
 #include <algorithm>
@@ -79,10 +81,9 @@ void readFieldOfViewAsFocalLength(PropertySampler& properties, const Camera& sou
     if (!properties.sample(source.FieldOfView, nullptr)) {
         return;
     }
-    for (float& sample : properties.samples()) {
-        sample = toFloat(source.ComputeFocalLength(static_cast<double>(sample)));
-    }
-    camera.setValueAt(TnFbxCamera::kFbxCameraFocalLength, properties.time(), std::move(properties.samples()));
+    properties.samples().transform(
+        [&source](float angle) { return toFloat(source.ComputeFocalLength(static_cast<double>(angle))); });
+    properties.samples().moveInto(*camera.getCameraChannel(TnFbxCamera::kFbxCameraFocalLength), properties.time());
 }
 
 void readLens(PropertySampler& properties, const Camera& source, TnFbxCamera& camera) {
@@ -125,23 +126,25 @@ struct LookAtRange {
     float rate = 0.0f;
     int start = kNoStart;
     int end = kNoEnd;
+    bool isConstant = true; // no ingredient changes
+
+    void include(FbxSdk& sdk, const TnFbxChannel& channel) {
+        if (channel.getAnimated()) {
+            sdk.getCameraFrameRange(channel.getTime(), found, rate, start, end);
+            isConstant = isConstant && channel.isConstant();
+        }
+    }
 
     bool isAnimated() const { return end >= start && end != kNoEnd && start != kNoStart; }
 };
 
-LookAtRange lookAtRange(FbxSdk& sdk, const TnFbxCamera& camera) {
+LookAtRange lookAtRange(FbxSdk& sdk, TnFbxCamera& camera) {
     LookAtRange range;
     for (int i = 0; i < 3; ++i) {
-        const auto channel = channelAfter(TnFbxTransform::kFbxTransformPositionX, i);
-        if (camera.getTransformAnimated(channel)) {
-            sdk.getCameraFrameRange(camera.getTransformTime(channel), range.found, range.rate, range.start, range.end);
-        }
+        range.include(sdk, *camera.getTransformChannel(channelAfter(TnFbxTransform::kFbxTransformPositionX, i)));
     }
     for (int i = TnFbxCamera::kFbxCameraLookAtPositionX; i <= TnFbxCamera::kFbxCameraRoll; ++i) {
-        const auto channel = static_cast<TnFbxCamera::EFbxCameraChannelType>(i);
-        if (camera.getAnimated(channel)) {
-            sdk.getCameraFrameRange(camera.getTime(channel), range.found, range.rate, range.start, range.end);
-        }
+        range.include(sdk, *camera.getCameraChannel(static_cast<TnFbxCamera::EFbxCameraChannelType>(i)));
     }
     return range;
 }
@@ -154,6 +157,7 @@ bool FbxSdk::getCamera(TnFbxTime& time, bool global, bool useSampleFPS, float sa
     if (source == nullptr) {
         return fail("no node with a camera to read");
     }
+    const detail::ReadScope scope(*this);
     PropertySampler properties = sampler(time, useSampleFPS, sampleFPS);
     camera.setName(node->GetName());
     properties.readIntoTransform(camera, TnFbxTransform::kFbxTransformPositionX, node->LclTranslation);
@@ -180,7 +184,7 @@ bool FbxSdk::getCamera(TnFbxTime& time, bool global, bool useSampleFPS, float sa
     setPlanes(camera, *source);
     setProjection(camera, *source);
     readFilmOffset(properties, *source, camera);
-    return succeed();
+    return scope.finish(succeed());
 }
 
 /// The look-at channels of a camera that has a target; whether it has one.
@@ -194,16 +198,18 @@ bool FbxSdk::getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node
         properties.sampleVectorInto(camera, TnFbxCamera::kFbxCameraLookAtPositionX, node.LclTranslation);
         return true;
     }
-    std::array<std::vector<float>, 3> position;
-    std::vector<float> unused[6];
-    if (getGlobalPositionRotationScaleValues(time, target, geometric, position[0], position[1], position[2], unused[0],
-                                             unused[1], unused[2], unused[3], unused[4], unused[5])) {
-        for (int i = 0; i < 3; ++i) {
-            const auto channel = channelAfter(TnFbxCamera::kFbxCameraLookAtPositionX, i);
-            std::vector<float>& samples = position[static_cast<std::size_t>(i)];
-            camera.setValue(channel, samples.front());
-            camera.setValueAt(channel, time, std::move(samples));
-        }
+    if (time.getStartFrame() > time.getEndFrame()) {
+        return true;
+    }
+    detail::GlobalSampler globals(*this, time);
+    globals.add(*target, geometric);
+    globals.sample(*mSamples);
+    detail::GlobalRuns& position = *globals.take(*target, geometric);
+    for (int i = 0; i < 3; ++i) {
+        const auto channel = channelAfter(TnFbxCamera::kFbxCameraLookAtPositionX, i);
+        detail::SampleRun& run = position[static_cast<std::size_t>(i)];
+        camera.setValue(channel, run.first());
+        run.moveInto(*camera.getCameraChannel(channel), time);
     }
     return true;
 }
@@ -211,28 +217,33 @@ bool FbxSdk::getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node
 /// The rotation toward the look-at point, for every frame at which one of its ingredients is animated.
 void FbxSdk::setLookAtRotation(TnFbxCamera& camera) {
     const LookAtRange range = lookAtRange(*this, camera);
-    const std::int64_t count = detail::frameCount(range.start, range.end);
-    if (!range.isAnimated() || !detail::takeSamples(mSamplesLeft, count, /*channelCount*/ 3)) {
+    const detail::SampleRange frames = {range.start, range.end};
+    if (!range.isAnimated() || !(range.isConstant || mSamples->take(frames, range.rate, /*channelCount*/ 3))) {
         setStaticLookAtRotation(camera);
         return;
     }
 
-    std::array<std::vector<float>, 3> angles;
-    for (std::vector<float>& angle : angles) {
-        angle.reserve(static_cast<std::size_t>(count));
+    const std::int64_t count = detail::frameCount(range.start, range.end);
+    std::array<detail::SampleRun, 3> angles;
+    for (detail::SampleRun& angle : angles) {
+        angle.begin(static_cast<std::size_t>(count));
     }
-    for (int frame = range.start; frame <= range.end; ++frame) { // both ends lie far inside the range of an int
-        float x = 0.0f, y = 0.0f, z = 0.0f;
-        camera.calculateCameraRotationAt(x, y, z, static_cast<float>(frame));
-        angles[0].push_back(x);
-        angles[1].push_back(y);
-        angles[2].push_back(z);
+    for (std::int64_t i = 0; i < (range.isConstant ? 1 : count); ++i) {
+        std::array<float, 3> at{};
+        camera.calculateCameraRotationAt(at[0], at[1], at[2], static_cast<float>(range.start + i));
+        for (std::size_t axis = 0; axis < angles.size(); ++axis) {
+            angles[axis].add(at[axis]);
+        }
     }
     TnFbxTime time;
     time.setTime(0.0f, range.start, range.end, range.rate);
-    for (int i = 0; i < 3; ++i) {
-        camera.setTransformValueAt(channelAfter(TnFbxTransform::kFbxTransformRotationX, i), time,
-                                   std::move(angles[static_cast<std::size_t>(i)]));
+    for (int axis = 0; axis < 3; ++axis) {
+        detail::SampleRun& angle = angles[static_cast<std::size_t>(axis)];
+        if (range.isConstant) {
+            angle.setConstant(angle.first());
+        }
+        TnFbxChannel* channel = camera.getTransformChannel(channelAfter(TnFbxTransform::kFbxTransformRotationX, axis));
+        angle.moveInto(*channel, time);
     }
 }
 

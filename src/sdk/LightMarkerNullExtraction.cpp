@@ -5,6 +5,7 @@
 #include "FbxSdk.h"
 
 #include "PropertySampling.h"
+#include "ReadScope.h"
 #include "access/AttributeEnums.h"
 #include "calls/LastError.h"
 
@@ -39,10 +40,8 @@ void readIntensity(PropertySampler& properties, TnFbxLight& light, const Light& 
     light.setValue(TnFbxLight::kFbxLightIntensity,
                    toFloat(source.Intensity.Get()) * TnFbxLight::kNormalizeLightIntensity);
     if (properties.sample(source.Intensity, nullptr)) {
-        for (float& sample : properties.samples()) {
-            sample *= TnFbxLight::kNormalizeLightIntensity;
-        }
-        light.setValueAt(TnFbxLight::kFbxLightIntensity, properties.time(), std::move(properties.samples()));
+        properties.samples().transform([](float sample) { return sample * TnFbxLight::kNormalizeLightIntensity; });
+        properties.samples().moveInto(*light.getLightChannel(TnFbxLight::kFbxLightIntensity), properties.time());
     }
 }
 
@@ -54,6 +53,7 @@ bool FbxSdk::getLight(TnFbxTime& time, bool global, bool useSampleFPS, float sam
     if (source == nullptr) {
         return fail("no node with a light to read");
     }
+    const detail::ReadScope scope(*this);
     light.setName(node->GetName());
     if (!getTransform(time, global, useSampleFPS, sampleFPS, node, light, geometric)) {
         return false;
@@ -64,7 +64,7 @@ bool FbxSdk::getLight(TnFbxTime& time, bool global, bool useSampleFPS, float sam
     properties.readInto(light, TnFbxLight::kFbxLightConeAngle, source->OuterAngle);
     light.setLightType(detail::lookUp(detail::kLightTypes, enumNumber(source->LightType), detail::kOtherLightType));
     light.setDecayType(detail::lookUp(detail::kDecayTypes, enumNumber(source->DecayType), detail::kOtherDecayType));
-    return succeed();
+    return scope.finish(succeed());
 }
 
 bool FbxSdk::getMarker(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
@@ -73,6 +73,7 @@ bool FbxSdk::getMarker(TnFbxTime& time, bool global, bool useSampleFPS, float sa
     if (source == nullptr) {
         return fail("no node with a marker to read");
     }
+    const detail::ReadScope scope(*this);
     marker.setName(node->GetName());
     if (!getTransform(time, global, useSampleFPS, sampleFPS, node, marker, geometric)) {
         return false;
@@ -81,7 +82,7 @@ bool FbxSdk::getMarker(TnFbxTime& time, bool global, bool useSampleFPS, float sa
     readColour(properties, marker, TnFbxMarker::kFbxMarkerRed, source->Color);
     marker.setMarkerSize(toFloat(source->Size.Get()));
     marker.setMarkerLookType(detail::lookUp(detail::kMarkerLooks, enumNumber(source->Look), detail::kOtherMarkerLook));
-    return succeed();
+    return scope.finish(succeed());
 }
 
 bool FbxSdk::getNull(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,

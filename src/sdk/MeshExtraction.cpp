@@ -6,6 +6,7 @@
 
 #include "LayerReading.h"
 #include "PropertySampling.h"
+#include "ReadScope.h"
 #include "calls/LastError.h"
 
 #include "model/MeshArrays.h"
@@ -166,6 +167,7 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
     if (source == nullptr) {
         return fail("no node with a mesh to read");
     }
+    const detail::ReadScope scope(*this);
     mesh.setName(node->GetName());
     if (!getTransform(time, global, useSampleFPS, sampleFPS, node, mesh, geometric)) {
         return false;
@@ -192,7 +194,7 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
     mesh.setValidNormals(normals);
     mesh.setValidUVs(uvs);
     mesh.setValidColours(colours);
-    return succeed();
+    return scope.finish(succeed());
 }
 
 /// The points at the time's frame, deformed if anything deforms them; a deformer that yields no points leaves them

@@ -7,11 +7,35 @@
 #include "FbxSdk.h"
 
 #include <algorithm>
-#include <utility>
+#include <cmath>
 
 namespace Tarnell::Fbx {
 
 using detail::PropertySampler;
+
+namespace {
+
+/// Whether every key of a curve has the same value and leads to the next in a straight line or not at all. Then it has
+/// that value everywhere, but for the sign of a zero.
+bool isLevel(const fbxsdk::FbxAnimCurve& curve) {
+    const int keyCount = curve.KeyGetCount();
+    if (keyCount < 2) {
+        return true;
+    }
+    const float value = curve.KeyGetValue(0);
+    if (!std::isfinite(value) || (value == 0.0f && std::signbit(value))) {
+        return false;
+    }
+    for (int key = 0; key < keyCount; ++key) {
+        if (curve.KeyGetValue(key) != value || std::signbit(curve.KeyGetValue(key)) != std::signbit(value) ||
+            curve.KeyGetInterpolation(key) == fbxsdk::FbxAnimCurveDef::eInterpolationCubic) {
+            return false;
+        }
+    }
+    return true;
+}
+
+} // namespace
 
 std::vector<fbxsdk::FbxAnimLayer*> detail::layersOf(fbxsdk::FbxAnimStack* stack) {
     std::vector<fbxsdk::FbxAnimLayer*> layers;
@@ -29,12 +53,11 @@ std::vector<fbxsdk::FbxAnimLayer*> detail::layersOf(fbxsdk::FbxAnimStack* stack)
 }
 
 PropertySampler::PropertySampler(fbxsdk::FbxScene* scene, fbxsdk::FbxAnimStack* stack, const TnFbxTime& requested,
-                                 bool useSampleRate, float sampleRate, std::int64_t& samplesLeft,
-                                 FrameTimes& frameTimes)
+                                 bool useSampleRate, float sampleRate, SampleAccount& account, FrameTimes& frameTimes)
     : mTimeModeScope(scene), mLayers(layersOf(stack)),
       mTimeMode(scene != nullptr ? scene->GetGlobalSettings().GetTimeMode() : fbxsdk::FbxTime::eDefaultMode),
       mRate(toFloat(fbxsdk::FbxTime::GetFrameRate(mTimeMode))), mRequested(requested),
-      mConvert(useSampleRate && sampleRate > 0.0f), mSampleRate(sampleRate), mSamplesLeft(samplesLeft),
+      mConvert(useSampleRate && sampleRate > 0.0f), mSampleRate(sampleRate), mAccount(account),
       mFrameTimes(frameTimes) {}
 
 void PropertySampler::collectCurves(const fbxsdk::FbxProperty& property, const char* component) {
@@ -74,25 +97,43 @@ float PropertySampler::valueAt(const fbxsdk::FbxTime& moment) {
     return value;
 }
 
+bool PropertySampler::isConstant() const {
+    return std::all_of(mCurves.begin(), mCurves.end(),
+                       [](const SampledCurve& sampled) { return isLevel(*sampled.curve); });
+}
+
+/// The samples of a range that is none too long for an `int`; false when there is no memory for them.
+bool PropertySampler::sampleFrames(const SampleRange& range) {
+    const std::int64_t count = frameCount(range.first, range.last);
+    mSamples.begin(static_cast<std::size_t>(count));
+    mFrameTimes.begin(range.first, mRate); // kept: the scene's rate, also of frames converted to another one
+    if (isConstant()) {
+        mSamples.setConstant(valueAt(mFrameTimes.at(range.first)));
+        return true;
+    }
+    if (!mAccount.take(range, mRate, /*channelCount*/ 1)) {
+        return false;
+    }
+    for (std::int64_t i = 0; i < count; ++i) {
+        mSamples.add(valueAt(mFrameTimes.at(range.first + i)));
+    }
+    if (mSamples.isOneValue()) {
+        mAccount.giveBack(range);
+    }
+    return true;
+}
+
 bool PropertySampler::sample(const fbxsdk::FbxProperty& property, const char* component) {
     mTime.initTime();
-    mSamples.clear();
+    mSamples.begin(0);
     collectCurves(property, component);
     const SampleRange range = keyedRange();
     if (!range.isAnimation()) {
         return false;
     }
 
-    const std::int64_t count = frameCount(range.first, range.last);
-    if (count > 0) {
-        if (!takeSamples(mSamplesLeft, count, /*channelCount*/ 1)) {
-            return false;
-        }
-        mFrameTimes.begin(range.first, mRate); // kept: the scene's rate, also of frames converted to another one
-        mSamples.reserve(static_cast<std::size_t>(count));
-        for (std::int64_t i = 0; i < count; ++i) {
-            mSamples.push_back(valueAt(mFrameTimes.at(range.first + i)));
-        }
+    if (frameCount(range.first, range.last) > 0 && !sampleFrames(range)) {
+        return false;
     }
     mTime = sampledTime(range, mRate);
     return true;
@@ -105,14 +146,12 @@ void PropertySampler::readIntoTransform(TnFbxTransform& transform,
     for (int i = 0; i < 3; ++i) {
         const auto channel = channelAfter(firstChannel, i);
         transform.setTransformValue(channel, toFloat(value[i]));
-        if (sample(property, kComponents[i])) {
-            transform.setTransformValueAt(channel, mTime, std::move(mSamples));
-        }
+        sampleInto(transform, channel, property, kComponents[i]);
     }
 }
 
 detail::PropertySampler FbxSdk::sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS) {
-    return PropertySampler(mScene, mCurrentAnimStack, time, useSampleFPS, sampleFPS, mSamplesLeft, *mFrameTimes);
+    return PropertySampler(mScene, mCurrentAnimStack, time, useSampleFPS, sampleFPS, *mSamples, *mFrameTimes);
 }
 
 } // namespace Tarnell::Fbx

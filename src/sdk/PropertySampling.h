@@ -8,9 +8,14 @@
 #pragma once
 
 #include "FrameTimes.h"
+#include "SampleAccount.h"
 #include "SampleRange.h"
+#include "SampleRun.h"
 #include "access/TimeModeScope.h"
 
+#include "TnFbxCamera.h"
+#include "TnFbxLight.h"
+#include "TnFbxMarker.h"
 #include "TnFbxTime.h"
 #include "TnFbxTransform.h"
 
@@ -36,32 +41,46 @@ inline int enumNumber(const fbxsdk::FbxProperty& property) { return property.Get
 /// The layers of an animation stack, in order; none of a null stack.
 std::vector<fbxsdk::FbxAnimLayer*> layersOf(fbxsdk::FbxAnimStack* stack);
 
+/// A channel of an object, which must have it.
+inline TnFbxChannel& channelOf(TnFbxTransform& object, TnFbxTransform::EFbxTransformChannelType channel) {
+    return *object.getTransformChannel(channel);
+}
+inline TnFbxChannel& channelOf(TnFbxCamera& object, TnFbxCamera::EFbxCameraChannelType channel) {
+    return *object.getCameraChannel(channel);
+}
+inline TnFbxChannel& channelOf(TnFbxLight& object, TnFbxLight::EFbxLightChannelType channel) {
+    return *object.getLightChannel(channel);
+}
+inline TnFbxChannel& channelOf(TnFbxMarker& object, TnFbxMarker::EFbxMarkerChannelType channel) {
+    return *object.getMarkerChannel(channel);
+}
+
 /// The names under which a vector's components are keyed.
 inline constexpr const char* kComponents[] = {"X", "Y", "Z"};
 
 class PropertySampler {
 public:
     /// `requested` is the range to cover at least. Key frames are converted to `sampleRate` when `useSampleRate` is set
-    /// and the rate above 0. `samplesLeft` is shared by all samplers of a list, `frameTimes` by any.
+    /// and the rate above 0. `account` is shared by all samplers of a call, `frameTimes` by any.
     PropertySampler(fbxsdk::FbxScene* scene, fbxsdk::FbxAnimStack* stack, const TnFbxTime& requested,
-                    bool useSampleRate, float sampleRate, std::int64_t& samplesLeft, FrameTimes& frameTimes);
+                    bool useSampleRate, float sampleRate, SampleAccount& account, FrameTimes& frameTimes);
 
     /// Samples one component of a property, or a scalar property when `component` is null; `time` and `samples` hold
     /// the result until the next call.
     ///
-    /// False for a range of a single frame, or one over the limits. A property without keys gives true, no samples and
-    /// an inverted range, which no channel accepts.
+    /// False for a range of a single frame, and when the account refuses the samples. A property without keys gives
+    /// true, no samples and an inverted range, which no channel accepts.
     bool sample(const fbxsdk::FbxProperty& property, const char* component);
 
     const TnFbxTime& time() const { return mTime; }
-    std::vector<float>& samples() { return mSamples; }
+    SampleRun& samples() { return mSamples; }
 
     /// Samples straight into a channel of an object, which keeps what it held when there is nothing to store.
     template <class Object, class Channel>
     void sampleInto(Object& object, Channel channel, const fbxsdk::FbxProperty& property,
                     const char* component = nullptr) {
         if (sample(property, component)) {
-            object.setValueAt(channel, mTime, std::move(mSamples));
+            mSamples.moveInto(channelOf(object, channel), mTime);
         }
     }
 
@@ -90,6 +109,8 @@ private:
     void collectCurves(const fbxsdk::FbxProperty& property, const char* component);
     SampleRange keyedRange() const;
     float valueAt(const fbxsdk::FbxTime& moment);
+    bool isConstant() const;
+    bool sampleFrames(const SampleRange& range);
 
     std::vector<fbxsdk::FbxAnimLayer*> mLayers;
     fbxsdk::FbxTime::EMode mTimeMode;
@@ -97,7 +118,7 @@ private:
     TnFbxTime mRequested;
     bool mConvert;
     float mSampleRate;
-    std::int64_t& mSamplesLeft;
+    SampleAccount& mAccount;
     FrameTimes& mFrameTimes;
 
     /// A curve, and where it was evaluated last: the next sample is not far.
@@ -108,7 +129,7 @@ private:
 
     std::vector<SampledCurve> mCurves; // of the component being sampled, with and without keys
     TnFbxTime mTime;
-    std::vector<float> mSamples;
+    SampleRun mSamples;
 };
 
 } // namespace Tarnell::Fbx::detail

@@ -6,16 +6,13 @@
 
 #include "model/FrameArithmetic.h"
 
-#include "FbxSdk.h"
+#include "TnFbxTime.h"
 
 #include <algorithm>
 #include <cstdint>
 #include <limits>
 
 namespace Tarnell::Fbx::detail {
-
-/// No limit on the whole: what single nodes are read with, outside of a list.
-inline constexpr std::int64_t kUnlimitedSamples = std::numeric_limits<std::int64_t>::max();
 
 /// a − b, wrapping around in 32 bits.
 constexpr int wrappingSubtract(int a, int b) {
@@ -52,18 +49,6 @@ inline TnFbxTime sampledTime(const SampleRange& range, float rate) {
     TnFbxTime time;
     time.setTime(0.0f, range.first, range.last, frameCount(range.first, range.last) > 0 ? rate : 0.0f);
     return time;
-}
-
-/// Takes the samples of some channels over so many frames out of what is left. False, with nothing taken, when that
-/// goes over one of the limits.
-constexpr bool takeSamples(std::int64_t& samplesLeft, std::int64_t frameCount, std::int64_t channelCount) {
-    if (frameCount > FbxSdk::kMaxSamplesPerChannel || frameCount * channelCount > samplesLeft) {
-        return false;
-    }
-    if (samplesLeft != kUnlimitedSamples) {
-        samplesLeft -= frameCount * channelCount;
-    }
-    return true;
 }
 
 } // namespace Tarnell::Fbx::detail

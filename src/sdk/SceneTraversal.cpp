@@ -6,14 +6,14 @@
 // The six kinds of objects differ by a row: which nodes they are, and what reads one. Everything else is one walk.
 #include "FbxSdk.h"
 
+#include "GlobalSampler.h"
 #include "NodeGeometry.h"
 #include "PointCacheScope.h"
-#include "SampleRange.h"
+#include "ReadScope.h"
 #include "access/FileWarnings.h"
 #include "access/NodeWalk.h"
 #include "access/TimeModeScope.h"
 #include "calls/LastError.h"
-#include "calls/MemoryLimit.h"
 
 #include <algorithm>
 #include <cstdint>
@@ -197,6 +197,8 @@ void warnOfSurfaces(const std::string& fileName, fbxsdk::FbxScene& scene, std::u
 /// The state of one walk: what to read and where to put it.
 template <class Object>
 struct Walk {
+    using ObjectType = Object;
+
     TnFbxTime& time;
     ReadFlags flags;
     bool allObjects;
@@ -208,11 +210,13 @@ struct Walk {
 };
 
 template <class Object>
+fbxsdk::FbxAMatrix geometricOffset(const fbxsdk::FbxNode& node) {
+    return kKind<Object>.geometricOffset ? detail::geometricTransform(node) : fbxsdk::FbxAMatrix();
+}
+
+template <class Object>
 void readNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node, Object& object) {
-    fbxsdk::FbxAMatrix geometric;
-    if (kKind<Object>.geometricOffset) {
-        geometric = detail::geometricTransform(node);
-    }
+    fbxsdk::FbxAMatrix geometric = geometricOffset<Object>(node);
     kKind<Object>.read(sdk, walk.time, walk.flags, node, object, geometric); // the object keeps what a failure left
 }
 
@@ -235,33 +239,63 @@ bool visitNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node) {
     return true;
 }
 
-/// A node and what is below it, as far as there is room and until the object asked for was found.
+/// Cameras are placed by their local channels.
 template <class Object>
-bool walkSubtree(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode* top) {
-    if (walk.objects == nullptr) {
-        return fail("no array to read into");
+constexpr bool kIsPlacedInWorld = !std::is_same_v<Object, TnFbxCamera>;
+
+/// The sampler of everything that a walk will read in the world; null when that is nothing.
+template <class Object>
+std::unique_ptr<detail::GlobalSampler> globalsOf(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode* top) {
+    if (!kIsPlacedInWorld<Object> || !walk.flags.globalTransform ||
+        walk.time.getStartFrame() > walk.time.getEndFrame()) {
+        return nullptr;
     }
-    bool hasRoom = true;
+    auto globals = std::make_unique<detail::GlobalSampler>(sdk, walk.time);
+    int room = walk.capacity - walk.index;
     detail::walkNodes(top, [&](fbxsdk::FbxNode& node) {
-        hasRoom = visitNode(sdk, walk, node);
-        return hasRoom && !walk.found;
+        const bool isRead =
+            (typeBit(node) & kKind<Object>.types) != 0 && (walk.allObjects || walk.objectName == node.GetName());
+        if (isRead) {
+            globals->add(node, geometricOffset<Object>(node));
+        }
+        return !isRead || (walk.allObjects && --room > 0);
     });
-    return hasRoom && succeed();
+    return globals;
 }
 
-/// The samples that a list may take; nodes that are read one by one have no such limit.
-class SampleShare {
+/// Puts a value in place until the scope ends, whichever way it does.
+template <class Value>
+class Temporarily {
 public:
-    SampleShare(std::int64_t& samplesLeft, std::int64_t share) : mSamplesLeft(samplesLeft) { mSamplesLeft = share; }
-    ~SampleShare() { mSamplesLeft = detail::kUnlimitedSamples; }
-    SampleShare(const SampleShare&) = delete;
-    SampleShare& operator=(const SampleShare&) = delete;
+    Temporarily(Value& place, Value value) : mPlace(place) { mPlace = std::move(value); }
+    ~Temporarily() { mPlace = Value(); }
+    Temporarily(const Temporarily&) = delete;
+    Temporarily& operator=(const Temporarily&) = delete;
 
 private:
-    std::int64_t& mSamplesLeft;
+    Value& mPlace;
 };
 
 } // namespace
+
+/// A node and what is below it, as far as there is room and until the object asked for was found.
+template <class Walk>
+bool FbxSdk::walkSubtree(const Walk& walk, fbxsdk::FbxNode* top) {
+    if (walk.objects == nullptr) {
+        return fail("no array to read into");
+    }
+    const detail::ReadScope scope(*this);
+    const Temporarily globals(mGlobals, globalsOf(*this, walk, top));
+    if (mGlobals != nullptr) {
+        mGlobals->sample(*mSamples);
+    }
+    bool hasRoom = true;
+    detail::walkNodes(top, [&](fbxsdk::FbxNode& node) {
+        hasRoom = visitNode(*this, walk, node);
+        return hasRoom && !walk.found;
+    });
+    return scope.finish(hasRoom && succeed());
+}
 
 // ---- Counting ----
 
@@ -346,8 +380,7 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
         return fail("no scene is loaded");
     }
     const detail::TimeModeScope timeMode(mScene);
-    mMemory->begin();
-    const SampleShare share(mSamplesLeft, mSamplesOfFiles > 0 ? mSamplesOfFiles : kMaxSamplesPerList);
+    const detail::ReadScope scope(*this);
     TnFbxTime time;
     getGlobalAnimationStackTime(time, info.getFrame(), info.getUseSampleFPS(), info.getSampleFPS());
     int index = 0;
@@ -365,16 +398,13 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     bool result = succeed();
     fbxsdk::FbxNode* root = mScene->GetRootNode();
     for (int i = 0; root != nullptr && result && !found && i < root->GetChildCount(); ++i) {
-        result = walkSubtree(*this, walk, root->GetChild(i));
+        result = walkSubtree(walk, root->GetChild(i));
     }
     if (result && !found) {
         warnOfSurfaces(mFileName, *mScene, kCountedOnly<Object>,
                        info.getAllObjects() ? nullptr : &info.getObjectName());
     }
-    if (result && mMemory->exceeded()) {
-        return fail((mFileName.empty() ? "" : mFileName + ": ") + mMemory->describe());
-    }
-    return result;
+    return scope.finish(result);
 }
 
 bool FbxSdk::getMeshes(TnFbxReadInfo& info, TnFbxMesh* meshes, int count) { return readList(info, meshes, count); }
@@ -425,43 +455,43 @@ bool FbxSdk::getMeshesRecursive(TnFbxTime& time, bool globalTransform, bool useS
                                 bool allObjects, bool transformPoints, const std::string& objectName,
                                 fbxsdk::FbxNode* node, int& index, TnFbxMesh* meshes, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, transformPoints};
-    return walkSubtree<TnFbxMesh>(*this, {time, flags, allObjects, objectName, meshes, count, index, found}, node);
+    return walkSubtree(Walk<TnFbxMesh>{time, flags, allObjects, objectName, meshes, count, index, found}, node);
 }
 
 bool FbxSdk::getCamerasRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                  bool computeCameraRotation, bool allObjects, const std::string& objectName,
                                  fbxsdk::FbxNode* node, int& index, TnFbxCamera* cameras, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, computeCameraRotation, false};
-    return walkSubtree<TnFbxCamera>(*this, {time, flags, allObjects, objectName, cameras, count, index, found}, node);
+    return walkSubtree(Walk<TnFbxCamera>{time, flags, allObjects, objectName, cameras, count, index, found}, node);
 }
 
 bool FbxSdk::getLightsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                 bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                                 TnFbxLight* lights, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
-    return walkSubtree<TnFbxLight>(*this, {time, flags, allObjects, objectName, lights, count, index, found}, node);
+    return walkSubtree(Walk<TnFbxLight>{time, flags, allObjects, objectName, lights, count, index, found}, node);
 }
 
 bool FbxSdk::getMarkersRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                  bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                                  TnFbxMarker* markers, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
-    return walkSubtree<TnFbxMarker>(*this, {time, flags, allObjects, objectName, markers, count, index, found}, node);
+    return walkSubtree(Walk<TnFbxMarker>{time, flags, allObjects, objectName, markers, count, index, found}, node);
 }
 
 bool FbxSdk::getNullsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                                TnFbxNull* nulls, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
-    return walkSubtree<TnFbxNull>(*this, {time, flags, allObjects, objectName, nulls, count, index, found}, node);
+    return walkSubtree(Walk<TnFbxNull>{time, flags, allObjects, objectName, nulls, count, index, found}, node);
 }
 
 bool FbxSdk::getTransformsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                     bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                                     TnFbxTransform* transforms, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
-    return walkSubtree<TnFbxTransform>(*this, {time, flags, allObjects, objectName, transforms, count, index, found},
-                                       node);
+    return walkSubtree(Walk<TnFbxTransform>{time, flags, allObjects, objectName, transforms, count, index, found},
+                       node);
 }
 
 } // namespace Tarnell::Fbx

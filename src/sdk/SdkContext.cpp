@@ -6,7 +6,9 @@
 #include "FbxSdk.h"
 
 #include "FrameTimes.h"
+#include "GlobalSampler.h"
 #include "PropertySampling.h"
+#include "SampleAccount.h"
 #include "SampleRange.h"
 #include "access/FileWarnings.h"
 #include "access/NodeWalk.h"
@@ -15,10 +17,6 @@
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 #include "model/FrameArithmetic.h"
-
-#include <algorithm>
-#include <filesystem>
-#include <system_error>
 
 namespace Tarnell::Fbx {
 
@@ -60,19 +58,18 @@ fbxsdk::FbxAnimStack* stackAt(fbxsdk::FbxScene& scene, int index) {
     return fbxsdk::FbxCast<fbxsdk::FbxAnimStack>(scene.GetSrcObject(isStack(), index));
 }
 
-/// How many samples a list read from the file may hold.
-std::int64_t samplesForFile(const std::string& fileName) {
-    std::error_code error;
-    const std::uintmax_t bytes = std::filesystem::file_size(fileName, error);
-    const auto most = static_cast<std::uintmax_t>(FbxSdk::kMaxSamplesPerList / FbxSdk::kSamplesPerFileByte);
-    const std::int64_t counted = error ? 0 : static_cast<std::int64_t>(std::min(bytes, most));
-    return std::min(FbxSdk::kSamplesOfAnyFile + counted * FbxSdk::kSamplesPerFileByte, FbxSdk::kMaxSamplesPerList);
+/// What the platform evaluates follows the stack, too. Whoever sets it is remembered in the scene's file, so it is set
+/// only where it is another one.
+void evaluateStack(fbxsdk::FbxScene& scene, fbxsdk::FbxAnimStack* stack) {
+    if (scene.GetCurrentAnimationStack() != stack) {
+        scene.SetCurrentAnimationStack(stack);
+    }
 }
 
 } // namespace
 
 FbxSdk::FbxSdk()
-    : mSamplesLeft(detail::kUnlimitedSamples), mMemory(std::make_unique<detail::MemoryAccount>()),
+    : mMemory(std::make_unique<detail::MemoryAccount>()), mSamples(std::make_unique<detail::SampleAccount>(*mMemory)),
       mFrameTimes(std::make_unique<detail::FrameTimes>()) {}
 
 FbxSdk::~FbxSdk() {
@@ -107,7 +104,6 @@ bool FbxSdk::destroyFbxSdkManager() {
     destroySdkObjects(&mManager);
     mScene = nullptr; // both died with the manager
     mFileName.clear();
-    mSamplesOfFiles = 0;
     mCurrentAnimStack = nullptr;
     mInitialized = false;
     return true; // the reason of a failure that led here stays
@@ -175,7 +171,6 @@ bool FbxSdk::loadScene(const std::string& fileName, bool convertGeometry) {
     }
     initCreateAnimationStack();
     mFileName = fileName;
-    mSamplesOfFiles = std::min(mSamplesOfFiles + samplesForFile(fileName), kMaxSamplesPerList);
     return succeed();
 }
 
@@ -198,6 +193,7 @@ void FbxSdk::initCreateAnimationStack() {
     mCurrentAnimStack = mScene->GetSrcObjectCount(isStack()) > 0
                             ? stackAt(*mScene, 0)
                             : fbxsdk::FbxAnimStack::Create(mScene, kDefaultAnimationStackName.c_str());
+    evaluateStack(*mScene, mCurrentAnimStack);
     const auto isLayer = fbxsdk::FbxCriteria::ObjectType(fbxsdk::FbxAnimLayer::ClassId);
     if (mCurrentAnimStack != nullptr && mCurrentAnimStack->GetSrcObjectCount(isLayer) == 0) {
         mCurrentAnimStack->AddMember(fbxsdk::FbxAnimLayer::Create(mScene, kDefaultLayerName));
@@ -210,6 +206,7 @@ bool FbxSdk::setCurrentAnimationStack(const std::string& name) {
         fbxsdk::FbxAnimStack* stack = stackAt(*mScene, i);
         if (stack != nullptr && name == stack->GetName()) {
             mCurrentAnimStack = stack;
+            evaluateStack(*mScene, stack);
             return succeed();
         }
     }

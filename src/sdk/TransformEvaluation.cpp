@@ -5,10 +5,13 @@
 // by frame; and the two numberings of rotation orders.
 #include "FbxSdk.h"
 
+#include "GlobalSampler.h"
 #include "NodeGeometry.h"
 #include "PropertySampling.h"
+#include "ReadScope.h"
 #include "access/RotationOrders.h"
 #include "calls/LastError.h"
+#include "calls/MemoryLimit.h"
 
 #include <array>
 #include <cmath>
@@ -54,41 +57,6 @@ EulerAngles eulerFromMatrix(const fbxsdk::FbxAMatrix& matrix) {
     return {std::atan2(-s, h), std::atan2(m(2, 0) * k, m(2, 2) * k), std::atan2(m(0, 1) * k, m(1, 1) * k)};
 }
 
-/// Directional and spot lights shine along an axis of their own that is not the node's.
-bool shinesAlongAnAxis(fbxsdk::FbxNode& node) {
-    auto* light = fbxsdk::FbxCast<fbxsdk::FbxLight>(node.GetNodeAttribute());
-    if (light == nullptr) {
-        return false;
-    }
-    const int type = detail::enumNumber(light->LightType);
-    return type == fbxsdk::FbxLight::eDirectional || type == fbxsdk::FbxLight::eSpot;
-}
-
-fbxsdk::FbxAMatrix lightAxisTurn() {
-    fbxsdk::FbxAMatrix turn;
-    turn.SetR(fbxsdk::FbxVector4(-90.0, 0.0, 0.0, 1.0));
-    return turn;
-}
-
-/// Position, rotation in degrees and scale, as the nine channels store them.
-using Placement = std::array<float, 9>;
-
-Placement decompose(FbxSdk& sdk, const fbxsdk::FbxAMatrix& matrix) {
-    const fbxsdk::FbxVector4 t = matrix.GetT();
-    const fbxsdk::FbxVector4 s = matrix.GetS();
-    float x = 0.0f, y = 0.0f, z = 0.0f;
-    // kept: which decomposition is used hangs on an exactly zero translation; they differ near gimbal lock
-    if (t[0] == 0.0 && t[1] == 0.0 && t[2] == 0.0) {
-        sdk.extractMatrixRotation(matrix, x, y, z);
-    } else {
-        const fbxsdk::FbxVector4 r = matrix.GetR();
-        x = toFloat(r[0]);
-        y = toFloat(r[1]);
-        z = toFloat(r[2]);
-    }
-    return {toFloat(t[0]), toFloat(t[1]), toFloat(t[2]), x, y, z, toFloat(s[0]), toFloat(s[1]), toFloat(s[2])};
-}
-
 } // namespace
 
 bool FbxSdk::getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
@@ -96,37 +64,48 @@ bool FbxSdk::getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float
     if (node == nullptr) {
         return fail("no node to read a transform from");
     }
+    const detail::ReadScope scope(*this);
     transform.setName(node->GetName());
     if (!global) {
         fbxsdk::FbxEuler::EOrder order = fbxsdk::FbxEuler::eOrderXYZ;
         node->GetRotationOrder(fbxsdk::FbxNode::eSourcePivot, order);
         transform.setTransformRotationOrder(getRotationOrderConstant(order));
         setTransformValues(node, time, useSampleFPS, sampleFPS, &transform);
-        return succeed();
+    } else if (time.getStartFrame() <= time.getEndFrame()) { // an empty range leaves the channels at their defaults
+        storeGlobalTransform(time, *node, geometric, transform);
     }
+    return scope.finish(succeed());
+}
 
-    std::array<std::vector<float>, 9> values;
-    if (getGlobalPositionRotationScaleValues(time, node, geometric, values[0], values[1], values[2], values[3],
-                                             values[4], values[5], values[6], values[7], values[8])) {
-        for (int i = 0; i < 9; ++i) {
-            const auto channel = detail::channelAfter(TnFbxTransform::kFbxTransformPositionX, i);
-            std::vector<float>& samples = values[static_cast<std::size_t>(i)];
-            transform.setTransformValue(channel, samples.front());
-            transform.setTransformValueAt(channel, time, std::move(samples));
-        }
+/// The samples in the world, which a list has made of all its nodes together, and a single node makes now.
+void FbxSdk::storeGlobalTransform(const TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxAMatrix& geometric,
+                                  TnFbxTransform& transform) {
+    detail::GlobalRuns* runs = mGlobals != nullptr ? mGlobals->take(node, geometric) : nullptr;
+    detail::GlobalSampler alone(*this, time);
+    if (runs == nullptr) {
+        alone.add(node, geometric);
+        alone.sample(*mSamples);
+        runs = alone.take(node, geometric);
     }
-    return succeed(); // an empty range leaves the channels at their defaults
+    int channel = TnFbxTransform::kFbxTransformPositionX;
+    for (detail::SampleRun& run : *runs) {
+        TnFbxChannel& target =
+            *transform.getTransformChannel(static_cast<TnFbxTransform::EFbxTransformChannelType>(channel++));
+        target.setValue(run.first());
+        run.moveInto(target, time);
+    }
 }
 
 bool FbxSdk::setTransformValues(fbxsdk::FbxNode* node, TnFbxTime& time, bool useSampleFPS, float sampleFPS,
                                 TnFbxTransform* transform) {
+    const detail::ReadScope scope(*this);
     if (node != nullptr && transform != nullptr) {
         PropertySampler properties = sampler(time, useSampleFPS, sampleFPS);
         for (const LocalRow& row : kLocalChannels) {
             properties.readIntoTransform(*transform, row.firstChannel, node->*row.property);
         }
     }
-    return true;
+    return scope.finish(true);
 }
 
 bool FbxSdk::getGlobalPositionRotationScaleValues(TnFbxTime& time, fbxsdk::FbxNode* node, fbxsdk::FbxAMatrix& geometric,
@@ -144,27 +123,20 @@ bool FbxSdk::getGlobalPositionRotationScaleValues(TnFbxTime& time, fbxsdk::FbxNo
         return false;
     }
 
-    const std::int64_t first = time.getStartFrame();
-    const std::int64_t asked = detail::frameCount(time.getStartFrame(), time.getEndFrame());
-    const std::int64_t count = detail::takeSamples(mSamplesLeft, asked, /*channelCount*/ 9) ? asked : 1;
-    for (std::vector<float>* channel : channels) {
-        channel->reserve(static_cast<std::size_t>(count));
+    const detail::ReadScope scope(*this);
+    // One float per frame and channel, whether they change or not.
+    const detail::SampleRange frames = {time.getStartFrame(), time.getEndFrame()};
+    if (!mSamples->take(frames, time.getFrameRate(), channels.size())) {
+        return scope.finish(true);
     }
-
-    const double rate = static_cast<double>(time.getFrameRate());
-    const bool turned = shinesAlongAnAxis(*node);
-    const fbxsdk::FbxAMatrix turn = lightAxisTurn();
-    for (std::int64_t frame = first; frame < first + count; ++frame) {
-        fbxsdk::FbxTime moment;
-        moment.SetSecondDouble(static_cast<double>(frame) / rate);
-        fbxsdk::FbxAMatrix matrix = detail::globalTransform(*node, moment);
-        if (turned) {
-            matrix = matrix * turn;
-        }
-        const Placement placement = decompose(*this, matrix * geometric);
-        for (std::size_t i = 0; i < channels.size(); ++i) {
-            channels[i]->push_back(placement[i]);
-        }
+    detail::MemoryAccount unlimited;
+    detail::SampleAccount account(unlimited);
+    detail::GlobalSampler globals(*this, time);
+    globals.add(*node, geometric);
+    globals.sample(account);
+    detail::GlobalRuns& runs = *globals.take(*node, geometric);
+    for (std::size_t i = 0; i < channels.size(); ++i) {
+        *channels[i] = runs[i].takeAll();
     }
     return true;
 }

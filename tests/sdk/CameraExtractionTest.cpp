@@ -2,6 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Cameras out of nodes, and producer cameras.
+#include "support/MemoryLimitScope.h"
 #include "support/SceneBuilders.h"
 
 #include "TnFbxError.h"
@@ -603,20 +604,42 @@ TEST(CameraExtraction, SurvivesAnAimThatIsNoNumber) {
     readCamera(scene, node, {false, true});
 }
 
-TEST(CameraExtraction, TakesTheAnglesOfOneFrameWhenTheIngredientsSpanTooManyFrames) {
+/// A camera that brings samples at both ends of the range of frames: so many, and the same number at the other end.
+Camera cameraOfAllFrames(const std::vector<float>& samples) {
+    const int count = static_cast<int>(samples.size());
+    Camera camera;
+    TnFbxTime first, last;
+    first.setTime(0.0f, -2000000000, -2000000000 + count - 1, 24.0f);
+    last.setTime(0.0f, 2000000000 - count + 1, 2000000000, 24.0f);
+    camera.setValueAt(Camera::kFbxCameraLookAtPositionX, first, samples);
+    camera.setValueAt(Camera::kFbxCameraLookAtPositionY, last, samples);
+    return camera;
+}
+
+TEST(CameraExtraction, FailsWhenTheIngredientsSpanMoreFramesThanThereIsMemoryFor) {
+    const support::MemoryLimitScope limit(1 << 30);
     TestScene scene;
     fbxsdk::FbxNode* node = addCamera(scene);
-    Camera camera; // the object brings samples at both ends of the range of frames
-    TnFbxTime first, last;
-    first.setTime(0.0f, -2000000000, -2000000000, 24.0f);
-    last.setTime(0.0f, 2000000000, 2000000000, 24.0f);
-    camera.setValueAt(Camera::kFbxCameraLookAtPositionX, first, {1.0f});
-    camera.setValueAt(Camera::kFbxCameraLookAtPositionY, last, {1.0f});
+    Camera camera = cameraOfAllFrames({1.0f, 2.0f});
+
+    EXPECT_FALSE(readInto(scene, node, camera, {false, true}));
+
+    EXPECT_NE(lastError().find("frames -2000000000 to 2000000000 at 24"), std::string::npos) << lastError();
+    EXPECT_FALSE(camera.getTransformAnimated(kRotationX));
+    EXPECT_EQ(rotationOf(camera), rotationAt(camera, 0.0f));
+}
+
+TEST(CameraExtraction, TakesOneRotationForAllFramesOfIngredientsThatDoNotChange) {
+    TestScene scene;
+    fbxsdk::FbxNode* node = addCamera(scene);
+    Camera camera = cameraOfAllFrames({1.0f});
 
     EXPECT_TRUE(readInto(scene, node, camera, {false, true}));
 
-    EXPECT_FALSE(camera.getTransformAnimated(kRotationX));
-    EXPECT_EQ(rotationOf(camera), rotationAt(camera, 0.0f));
+    const TnFbxChannel& x = *camera.getTransformChannel(kRotationX);
+    test::expectRange(x.getTime(), -2000000000, 2000000000, 24.0f);
+    EXPECT_TRUE(x.isConstant());
+    EXPECT_EQ(x.getAnimatedValue(1e9f), rotationAt(camera, 1e9f)[0]);
 }
 
 // ---- The frame range ----

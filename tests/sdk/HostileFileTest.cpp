@@ -121,7 +121,9 @@ TEST(HostileFile, ClaimsOfAnEndlessAnimationCostNoMemory) {
 
     ASSERT_EQ(count, 40);
     for (int i = 0; i < count; ++i) {
-        EXPECT_FALSE(nulls[i].getTransformAnimated(TnFbxTransform::kFbxTransformPositionX));
+        const TnFbxChannel& channel = *nulls[i].getTransformChannel(TnFbxTransform::kFbxTransformPositionX);
+        EXPECT_EQ(channel.getTime().getEndFrame(), 10'000'000);
+        EXPECT_TRUE(channel.isConstant());
         EXPECT_EQ(nulls[i].getTransformValue(TnFbxTransform::kFbxTransformScaleX), 1.0f);
     }
 }

@@ -4,12 +4,18 @@
 // Sampling: which frames an animated property is sampled over, and what the samples are.
 #include "sdk/SampleRange.h"
 
+#include "TnFbxError.h"
+
+#include "support/MemoryLimitScope.h"
 #include "support/SceneBuilders.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdint>
+#include <cstring>
 #include <limits>
+#include <string>
+#include <utility>
 
 namespace Tarnell::Fbx {
 namespace {
@@ -99,19 +105,6 @@ TEST(SampleRange, OfHalfTheIntegersIsNoAnimation) {
     detail::SampleRange range;
     range.include(kLowest, 0);
     EXPECT_FALSE(range.isAnimation());
-}
-
-TEST(SampleLimits, HoldForOneChannelAndForTheWhole) {
-    std::int64_t left = 100;
-    EXPECT_TRUE(detail::takeSamples(left, 10, 9));
-    EXPECT_EQ(left, 10);
-    EXPECT_FALSE(detail::takeSamples(left, 11, 1));
-    EXPECT_EQ(left, 10);
-
-    std::int64_t unlimited = detail::kUnlimitedSamples;
-    EXPECT_TRUE(detail::takeSamples(unlimited, FbxSdk::kMaxSamplesPerChannel, 9));
-    EXPECT_EQ(unlimited, detail::kUnlimitedSamples);
-    EXPECT_FALSE(detail::takeSamples(unlimited, FbxSdk::kMaxSamplesPerChannel + 1, 1));
 }
 
 TEST(PropertySampling, KeepsTheStaticValueOfAPropertyWithoutCurves) {
@@ -264,16 +257,82 @@ TEST(PropertySampling, NeverMakesACurve) {
     EXPECT_EQ(scene.scene->GetSrcObjectCount<fbxsdk::FbxAnimCurveNode>(), 0);
 }
 
-TEST(PropertySampling, KeepsTheStaticValueWhenTheStackSpansMoreFramesThanAChannelHolds) {
+TEST(PropertySampling, FailsWhereTheSamplesWouldTakeMoreThanTheLimit) {
+    const support::MemoryLimitScope limit(1 << 20);
     TestScene scene(0, 10);
     fbxsdk::FbxNode* node = scene.addNode("moving");
     node->LclTranslation.Set({3.0, 0.0, 0.0});
     scene.key(node->LclTranslation, "X", {{0, 0.0f}, {10, 10.0f}});
 
-    for (const int last : {static_cast<int>(FbxSdk::kMaxSamplesPerChannel), 2000000000, kHighest}) {
-        const Transform transform = localTransform(scene, node, timeRecord(0, last));
+    for (const int last : {1 << 18, 2000000000, kHighest - 1}) {
+        Transform transform;
+        TnFbxTime time = timeRecord(0, last);
+        EXPECT_FALSE(scene.sdk.setTransformValues(node, time, false, 0.0f, &transform));
+        EXPECT_NE(lastError().find("frames 0 to " + std::to_string(last) + " at 24"), std::string::npos) << lastError();
+        EXPECT_NE(lastError().find("the limit is 1.0 MiB"), std::string::npos) << lastError();
         EXPECT_FALSE(transform.getTransformAnimated(Transform::kFbxTransformPositionX));
         EXPECT_EQ(transform.getTransformValue(Transform::kFbxTransformPositionX), 3.0f);
+    }
+    const Transform transform = localTransform(scene, node, timeRecord(0, (1 << 18) - 1)); // exactly the limit
+    test::expectRange(transform.getTransformTime(Transform::kFbxTransformPositionX), 0, (1 << 18) - 1, 24.0f);
+}
+
+TEST(PropertySampling, TakesNoMemoryPerFrameForWhatDoesNotChange) {
+    const support::MemoryLimitScope limit(1024);
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("still");
+    scene.key(node->LclTranslation, "X", {{0, 2.0f}});
+    scene.key(node->LclTranslation, "Y", {{0, 4.0f}, {10, 4.0f}});
+
+    Transform transform = localTransform(scene, node, timeRecord(0, 2000000000));
+
+    for (const auto& [channel, value] :
+         {std::pair(Transform::kFbxTransformPositionX, 2.0f), std::pair(Transform::kFbxTransformPositionY, 4.0f)}) {
+        test::expectRange(transform.getTransformTime(channel), 0, 2000000000, 24.0f);
+        EXPECT_TRUE(transform.getTransformChannel(channel)->isConstant());
+        EXPECT_EQ(transform.getTransformValueAt(channel, 1e9f), value);
+    }
+}
+
+TEST(PropertySampling, GivesBackWhatTurnsOutNotToChange) {
+    const support::MemoryLimitScope limit(4 * 1000); // two channels one after the other, not both
+    TestScene scene(0, 10);
+    fbxsdk::FbxNode* node = scene.addNode("nearly still");
+    const float large = 16777216.0f; // a change of less than one is none
+    fbxsdk::FbxAnimCurve* curve = scene.key(node->LclTranslation, "X", {{0, large}, {10, large}});
+    curve->KeySetInterpolation(0, fbxsdk::FbxAnimCurveDef::eInterpolationCubic);
+    scene.key(node->LclTranslation, "Y", {{0, 0.0f}, {999, 1.0f}});
+
+    Transform transform = localTransform(scene, node, timeRecord(0, 999));
+
+    EXPECT_TRUE(transform.getTransformChannel(Transform::kFbxTransformPositionX)->isConstant());
+    EXPECT_EQ(transform.getTransformValueAt(Transform::kFbxTransformPositionX, 500.0f), large);
+    EXPECT_EQ(transform.getTransformValueAt(Transform::kFbxTransformPositionY, 999.0f), 1.0f);
+}
+
+TEST(PropertySampling, GivesTheBitsOfCurvesThatAreLevelAndOfThoseThatSeemSo) {
+    TestScene scene(0, 10);
+    const float nan = std::numeric_limits<float>::quiet_NaN();
+    const std::pair<float, float> ends[] = {{4.0f, 4.0f},  {0.0f, 0.0f}, {-0.0f, -0.0f},
+                                            {0.0f, -0.0f}, {nan, nan},   {4.0f, 5.0f}};
+    for (const auto& [first, last] : ends) {
+        for (const auto interpolation :
+             {fbxsdk::FbxAnimCurveDef::eInterpolationLinear, fbxsdk::FbxAnimCurveDef::eInterpolationConstant,
+              fbxsdk::FbxAnimCurveDef::eInterpolationCubic}) {
+            fbxsdk::FbxNode* node = scene.addNode("node");
+            fbxsdk::FbxAnimCurve* curve = scene.key(node->LclTranslation, "X", {{0, first}, {10, last}});
+            curve->KeySetInterpolation(0, interpolation);
+
+            const Samples samples =
+                test::samplesOf(localTransform(scene, node, scene.time()), Transform::kFbxTransformPositionX);
+
+            ASSERT_EQ(samples.size(), 11u);
+            for (int frame = 0; frame <= 10; ++frame) {
+                const float expected = 0.0f + curve->Evaluate(timeOfFrame(frame));
+                EXPECT_EQ(std::memcmp(&samples[static_cast<std::size_t>(frame)], &expected, sizeof expected), 0)
+                    << first << " to " << last << ", " << interpolation << ", frame " << frame;
+            }
+        }
     }
 }
 

@@ -481,7 +481,7 @@ TEST(StackTime, SurvivesASpanOfAllTimes) {
         TnFbxReadInfo info = test::readAll(global);
         TnFbxTransform transform;
         EXPECT_TRUE(scene.sdk.getTransforms(info, &transform, 1));
-        EXPECT_FALSE(transform.getTransformAnimated(TnFbxTransform::kFbxTransformPositionX));
+        EXPECT_TRUE(transform.getTransformChannel(TnFbxTransform::kFbxTransformPositionX)->isConstant());
     }
 }
 

@@ -2,6 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Contexts share nothing, and files that are loaded into one context add up.
+#include "support/MemoryLimitScope.h"
 #include "support/TemporaryFolder.h"
 
 #include "Fbx.h"
@@ -11,6 +12,8 @@
 #include "TnFbxReadInfo.h"
 
 #include <gtest/gtest.h>
+
+#include <memory>
 
 namespace Tarnell::Fbx {
 namespace {
@@ -71,8 +74,7 @@ TEST(SeveralContexts, CountFramesAtTheRateOfTheirOwnScene) {
 
 TEST(SeveralFilesInOneContext, KeepTheAnimationOfTheFirst) {
     const support::TemporaryFolder folder;
-    // At 24 frames per second more frames than a file of a few bytes may have, but not than one of this size.
-    constexpr std::int64_t kSeconds = FbxSdk::kSamplesOfAnyFile / 24 + 10'000;
+    constexpr std::int64_t kSeconds = 500'000;
     const std::string settings = property("TimeMode", "enum", "11");
     const std::string longClip =
         folder.write("long.fbx", animatedNull(settings, kSeconds) + ";" + std::string(10'000, '-') + "\n");
@@ -83,6 +85,29 @@ TEST(SeveralFilesInOneContext, KeepTheAnimationOfTheFirst) {
     ASSERT_TRUE(sdk.loadScene(shortClip, /*convertGeometry*/ false)) << lastError();
 
     EXPECT_EQ(timeOfNull(sdk).getEndFrame(), 24 * kSeconds);
+}
+
+TEST(ReadsOverTheMemoryLimit, HandOutTheArrayAndNameTheFileTheFramesAndTheLimit) {
+    const support::MemoryLimitScope limit(1 << 16);
+    const support::TemporaryFolder folder;
+    const std::string file = folder.write("long.fbx", animatedNull(property("TimeMode", "enum", "11"), 1000));
+    TnFbxReadInfo info;
+    info.setFileName(file);
+    info.setAnimationStackName("any");
+
+    for (const bool global : {false, true}) {
+        info.setGlobalTransform(global);
+        TnFbxNull* nulls = nullptr;
+        int count = 0;
+        EXPECT_FALSE(Fbx().getNulls(info, &nulls, count));
+        const std::unique_ptr<TnFbxNull[]> owner(nulls);
+        ASSERT_EQ(count, 1);
+        ASSERT_NE(nulls, nullptr);
+        EXPECT_FALSE(nulls[0].getTransformAnimated(TnFbxTransform::kFbxTransformPositionX));
+        for (const std::string& part : {file, std::string("frames 0 to 24000 at 24"), std::string("64.0 KiB")}) {
+            EXPECT_NE(lastError().find(part), std::string::npos) << part << " in " << lastError();
+        }
+    }
 }
 
 } // namespace

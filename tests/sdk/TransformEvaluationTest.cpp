@@ -3,6 +3,7 @@
 //
 // Transforms: local ones as they are keyed, those in the world as they are evaluated, the two ways to decompose a
 // rotation, and the rotation orders.
+#include "support/MemoryLimitScope.h"
 #include "support/SceneBuilders.h"
 
 #include "TnFbxError.h"
@@ -529,28 +530,52 @@ TEST(GlobalValues, AreEmptiedForAnInvertedRangeAndForANullNode) {
     }
 }
 
-TEST(GlobalValues, HoldTheFirstFrameAloneForARangeOverTheLimits) {
+TEST(GlobalValues, AreNoneForARangeOverTheMemoryLimit) {
+    const support::MemoryLimitScope limit(1 << 20);
     TestScene scene(0, 0);
     fbxsdk::FbxNode* node = scene.addNode("node");
-    node->LclTranslation.Set({4.0, 0.0, 0.0});
     constexpr int kHighest = std::numeric_limits<int>::max();
-    for (const TnFbxTime& time : {timeRecord(0, kHighest), timeRecord(-kHighest - 1, kHighest),
-                                  timeRecord(0, static_cast<int>(FbxSdk::kMaxSamplesPerChannel))}) {
+    for (const TnFbxTime& time :
+         {timeRecord(0, kHighest), timeRecord(-kHighest - 1, kHighest), timeRecord(1, (1 << 18) / 9 + 1)}) {
         const GlobalValues all = globalValues(scene, node, time);
-        EXPECT_TRUE(all.result);
-        EXPECT_EQ(all.values[0], Samples({4.0f}));
+        EXPECT_FALSE(all.result);
+        EXPECT_NE(lastError().find("the limit is 1.0 MiB"), std::string::npos) << lastError();
+        for (const Samples& samples : all.values) {
+            EXPECT_TRUE(samples.empty());
+        }
     }
+    EXPECT_TRUE(globalValues(scene, node, timeRecord(1, (1 << 18) / 9)).result);
 }
 
-TEST(GlobalTransform, KeepsStaticValuesForARangeOverTheLimits) {
+TEST(GlobalTransform, OfANodeThatNothingAnimatesTakesTheMemoryOfOneFrame) {
+    const support::MemoryLimitScope limit(1024);
     TestScene scene(0, 0);
     fbxsdk::FbxNode* node = scene.addNode("node");
     node->LclTranslation.Set({4.0, 0.0, 0.0});
 
-    const Transform transform = readTransform(scene, node, true, timeRecord(0, std::numeric_limits<int>::max()));
+    Transform transform = readTransform(scene, node, true, timeRecord(0, std::numeric_limits<int>::max()));
 
-    EXPECT_FALSE(transform.getTransformAnimated(kPositionX));
+    test::expectRange(transform.getTransformTime(kPositionX), 0, std::numeric_limits<int>::max(), 24.0f);
+    EXPECT_TRUE(transform.getTransformChannel(kPositionX)->isConstant());
     EXPECT_EQ(transform.getTransformValue(kPositionX), 4.0f);
+    EXPECT_EQ(transform.getTransformValueAt(kPositionX, 1e9f), 4.0f);
+}
+
+TEST(GlobalTransform, FailsWhereWhatMovesWouldTakeMoreThanTheLimit) {
+    const support::MemoryLimitScope limit(100 * 4 * 2); // two channels over a hundred frames
+    TestScene scene(0, 0);
+    fbxsdk::FbxNode* node = scene.addNode("node");
+    scene.key(node->LclTranslation, "X", {{0, 1.0f}, {99, 99.0f}}); // not from the origin, where angles have a sign
+    scene.key(node->LclTranslation, "Y", {{0, 1.0f}, {99, 99.0f}});
+    EXPECT_TRUE(readTransform(scene, node, true, timeRecord(0, 99)).getTransformAnimated(kPositionX));
+
+    scene.key(node->LclTranslation, "Z", {{0, 1.0f}, {99, 99.0f}});
+    TnFbxTime time = timeRecord(0, 99);
+    Transform transform;
+    fbxsdk::FbxAMatrix geometric;
+    EXPECT_FALSE(scene.sdk.getTransform(time, true, false, 0.0f, node, transform, geometric));
+    EXPECT_NE(lastError().find("frames 0 to 99 at 24 frames per second"), std::string::npos) << lastError();
+    EXPECT_FALSE(transform.getTransformAnimated(after(kPositionX, 2)));
 }
 
 TEST(GlobalValues, SurviveARateOfZeroAndOneThatIsNoNumber) {

@@ -1,0 +1,76 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Places in the world, frame by frame, of all the nodes of a list together.
+#pragma once
+
+#include "SampleAccount.h"
+#include "SampleRun.h"
+
+#include "FbxSdk.h"
+
+#include <fbxsdk.h>
+
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <unordered_map>
+#include <vector>
+
+namespace Tarnell::Fbx::detail {
+
+/// Position, rotation (degrees) and scale, three channels each.
+using GlobalRuns = std::array<SampleRun, 9>;
+
+/// Evaluates nodes over a range of frames, and hands out their samples in the order in which they were added.
+///
+/// The frames are taken in portions, and in each portion node after node: of a branch the platform then needs to
+/// remember the transforms of one portion only, however long the range and however deep the tree. A node that nothing
+/// animates, itself or above it, is evaluated once.
+class GlobalSampler {
+public:
+    /// The range must not be inverted.
+    GlobalSampler(FbxSdk& sdk, const TnFbxTime& range);
+    ~GlobalSampler();
+    GlobalSampler(const GlobalSampler&) = delete;
+    GlobalSampler& operator=(const GlobalSampler&) = delete;
+
+    /// Parents before their children. `geometric` is multiplied from the right.
+    void add(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& geometric);
+
+    /// Makes the samples of every node added. Once the account refuses some nothing more is made; runs are incomplete
+    /// then.
+    void sample(SampleAccount& account);
+
+    /// The samples of the node that was added next, until the next call; null when that is another one, or none. The
+    /// first sample is there also in an incomplete run.
+    GlobalRuns* take(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& geometric);
+
+private:
+    struct MovingNode;
+    struct SampledNode {
+        fbxsdk::FbxNode* node;
+        std::unique_ptr<MovingNode> moving; // null: one sample says all
+    };
+    struct Ancestry {
+        bool isStill = true;
+        int depth = 0;
+    };
+
+    Ancestry ancestryOf(const fbxsdk::FbxNode& node);
+    fbxsdk::FbxTime timeOf(std::int64_t frame) const;
+    bool begin(MovingNode& node, SampleAccount& account) const;
+    bool goOn(MovingNode& node, const std::vector<fbxsdk::FbxTime>& times, SampleAccount& account) const;
+
+    FbxSdk& mSdk;
+    SampleRange mFrames;
+    float mRate;
+    std::vector<SampledNode> mNodes;
+    std::size_t mNext = 0; // to be handed out
+    std::unique_ptr<MovingNode> mTaken;
+    std::unordered_map<const fbxsdk::FbxNode*, Ancestry> mAncestries;
+    int mDepth = 1;
+};
+
+} // namespace Tarnell::Fbx::detail

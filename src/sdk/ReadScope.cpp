@@ -1,0 +1,36 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+#include "ReadScope.h"
+
+#include "SampleAccount.h"
+#include "calls/LastError.h"
+#include "calls/MemoryLimit.h"
+
+#include <utility>
+
+namespace Tarnell::Fbx {
+
+using detail::ReadScope;
+
+ReadScope::ReadScope(FbxSdk& sdk) : mSdk(sdk), mIsOutermost(!std::exchange(sdk.mIsReading, true)) {
+    if (mIsOutermost) {
+        sdk.mMemory->begin();
+        sdk.mSamples->begin();
+    }
+}
+
+ReadScope::~ReadScope() {
+    if (mIsOutermost) {
+        mSdk.mIsReading = false;
+    }
+}
+
+bool ReadScope::finish(bool result) const {
+    if (!mIsOutermost || !result || !mSdk.mMemory->exceeded()) {
+        return result;
+    }
+    const std::string file = mSdk.mFileName.empty() ? "" : mSdk.mFileName + ": ";
+    return fail(file + mSdk.mSamples->describe() + mSdk.mMemory->describe());
+}
+
+} // namespace Tarnell::Fbx

@@ -1,0 +1,27 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// One reading call of the host's, held against `memoryLimit()`.
+#pragma once
+
+#include "FbxSdk.h"
+
+namespace Tarnell::Fbx::detail {
+
+/// Reading calls call each other; the outermost one counts what all of them hand out.
+class ReadScope {
+public:
+    explicit ReadScope(FbxSdk& sdk);
+    ~ReadScope();
+    ReadScope(const ReadScope&) = delete;
+    ReadScope& operator=(const ReadScope&) = delete;
+
+    /// The result of the call: false, with the reason, when it was to be true and something was not handed out.
+    bool finish(bool result) const;
+
+private:
+    FbxSdk& mSdk;
+    bool mIsOutermost;
+};
+
+} // namespace Tarnell::Fbx::detail

@@ -1,0 +1,85 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The samples of one channel while they are made: as long as they are all the same there is only one.
+#pragma once
+
+#include "TnFbxChannel.h"
+#include "TnFbxTime.h"
+
+#include <cstddef>
+#include <cstring>
+#include <utility>
+#include <vector>
+
+namespace Tarnell::Fbx::detail {
+
+/// One sample per frame, from the first frame on.
+class SampleRun {
+public:
+    /// Forgets what it holds. `total`: how many samples there will be.
+    void begin(std::size_t total) {
+        mValues.clear();
+        mCount = 0;
+        mTotal = total;
+    }
+
+    /// Whether adding the value ends that all samples are one: from then on each takes memory.
+    bool spreadsWith(float value) const {
+        return mValues.empty() && mCount > 0 && std::memcmp(&value, &mFirst, sizeof value) != 0;
+    }
+
+    void add(float value) {
+        if (mCount == 0) {
+            mFirst = value;
+        } else if (!mValues.empty()) {
+            mValues.push_back(value);
+        } else if (spreadsWith(value)) {
+            mValues.reserve(mTotal);
+            mValues.assign(mCount, mFirst);
+            mValues.push_back(value);
+        }
+        ++mCount;
+    }
+
+    /// The value at all frames.
+    void setConstant(float value) {
+        mValues.clear();
+        mFirst = value;
+        mCount = mTotal;
+    }
+
+    /// Whether all samples are there.
+    bool isComplete() const { return mCount > 0 && mCount == mTotal; }
+    bool isOneValue() const { return mValues.empty(); }
+    float first() const { return mFirst; } ///< of a run that is not empty
+
+    /// Replaces every sample by a function of it.
+    template <class Function>
+    void transform(Function&& function) {
+        mFirst = function(mFirst);
+        for (float& value : mValues) {
+            value = function(value);
+        }
+    }
+
+    /// Into a channel, which takes them over unless some are missing or the range is none.
+    bool moveInto(TnFbxChannel& channel, const TnFbxTime& time) {
+        if (!isComplete()) {
+            return false;
+        }
+        return mValues.empty() ? channel.setConstantValues(time, mFirst)
+                               : channel.setAnimatedValues(time, std::move(mValues));
+    }
+
+    /// One float per frame, whether they are the same or not.
+    std::vector<float> takeAll() { return mValues.empty() ? std::vector<float>(mCount, mFirst) : std::move(mValues); }
+
+private:
+    std::vector<float> mValues; // empty while all are as the first
+    float mFirst = 0.0f;
+    std::size_t mCount = 0;
+    std::size_t mTotal = 0;
+};
+
+} // namespace Tarnell::Fbx::detail

@@ -1,0 +1,21 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Another memory limit for as long as a test needs it.
+#pragma once
+
+#include "TnFbxLimits.h"
+
+#include <cstdint>
+
+namespace support {
+
+class MemoryLimitScope {
+public:
+    explicit MemoryLimitScope(std::uint64_t bytes) { Tarnell::Fbx::setMemoryLimit(bytes); }
+    ~MemoryLimitScope() { Tarnell::Fbx::setMemoryLimit(0); }
+    MemoryLimitScope(const MemoryLimitScope&) = delete;
+    MemoryLimitScope& operator=(const MemoryLimitScope&) = delete;
+};
+
+} // namespace support
