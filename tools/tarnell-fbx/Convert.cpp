@@ -130,26 +130,47 @@ private:
                 expressInXyz(object);
             if (mOptions.fps)
                 resampleAll(object);
+            forEachChannel(object, makeStatic);
         }
         lose(turned, "not written: skews and pivots of objects");
         return true;
     }
 
-    /// The library's own sampling at another rate takes properties at the old times, so it is not used for channels.
-    void resampleAll(TnFbxTransform& object) const {
+    template <class Visit>
+    static void forEachChannel(TnFbxTransform& object, const Visit& visit) {
         for (int i = 0; i <= TnFbxTransform::kFbxTransformPivotZ; ++i)
-            resample(*object.getTransformChannel(static_cast<TnFbxTransform::EFbxTransformChannelType>(i)),
-                     *mOptions.fps);
+            visit(*object.getTransformChannel(static_cast<TnFbxTransform::EFbxTransformChannelType>(i)));
     }
-    void resampleAll(TnFbxCamera& camera) const {
-        resampleAll(static_cast<TnFbxTransform&>(camera));
+    template <class Visit>
+    static void forEachChannel(TnFbxCamera& camera, const Visit& visit) {
+        forEachChannel(static_cast<TnFbxTransform&>(camera), visit);
         for (int i = 0; i <= TnFbxCamera::kFbxCameraFilmOffsetY; ++i)
-            resample(*camera.getCameraChannel(static_cast<TnFbxCamera::EFbxCameraChannelType>(i)), *mOptions.fps);
+            visit(*camera.getCameraChannel(static_cast<TnFbxCamera::EFbxCameraChannelType>(i)));
     }
-    void resampleAll(TnFbxLight& light) const {
-        resampleAll(static_cast<TnFbxTransform&>(light));
+    template <class Visit>
+    static void forEachChannel(TnFbxLight& light, const Visit& visit) {
+        forEachChannel(static_cast<TnFbxTransform&>(light), visit);
         for (int i = 0; i <= TnFbxLight::kFbxLightConeAngle; ++i)
-            resample(*light.getLightChannel(static_cast<TnFbxLight::EFbxLightChannelType>(i)), *mOptions.fps);
+            visit(*light.getLightChannel(static_cast<TnFbxLight::EFbxLightChannelType>(i)));
+    }
+
+    /// The library's own sampling at another rate takes properties at the old times, so it is not used for channels.
+    template <class Object>
+    void resampleAll(Object& object) const {
+        forEachChannel(object, [this](TnFbxChannel& channel) { resample(channel, *mOptions.fps); });
+    }
+
+    static void forgetSamples(TnFbxChannel& channel) { channel.deleteChannel(); }
+
+    /// A long range in which a value does not change need not have a key for every frame of it.
+    static void makeStatic(TnFbxChannel& channel) {
+        constexpr int kFewFrames = 10'000;
+        const TnFbxTime time = channel.getTime();
+        const bool isLong = static_cast<long long>(time.getEndFrame()) - time.getStartFrame() >= kFewFrames;
+        if (channel.getAnimated() && channel.isConstant() && isLong) {
+            channel.setValue(channel.getAnimatedValue(static_cast<float>(time.getStartFrame())));
+            channel.deleteAnimatedValues();
+        }
     }
 
     static bool hasSkewOrPivot(const TnFbxTransform& object) {
@@ -169,6 +190,8 @@ private:
         chosen.erase(chosen.begin(), chosen.begin() + leadingViews(chosen));
         if (!mOptions.local)
             placeCameras();
+        for (TnFbxCamera* camera : chosen)
+            forEachChannel(*camera, makeStatic);
         const auto interested =
             std::count_if(chosen.begin(), chosen.end(), [](const TnFbxCamera* camera) { return hasInterest(*camera); });
         lose(static_cast<int>(interested), "not written: look-at points, up vectors and rolls of cameras");
@@ -259,6 +282,8 @@ private:
             });
             lose(static_cast<int>(moving), "written as they stand at the first frame (see --frames): moving meshes");
         }
+        for (TnFbxMesh* mesh : mMeshes.chosen)
+            forEachChannel(*mesh, forgetSamples); // their points are written in the world
         return true;
     }
 
@@ -294,11 +319,12 @@ private:
         for (const TnFbxMesh* mesh : mMeshes.chosen)
             written.insert(mesh->getName());
         auto& chosen = mTransforms.chosen;
-        const auto known = [&written](const TnFbxTransform* transform) {
+        const auto known = [&written](TnFbxTransform* transform) {
             const auto found = written.find(transform->getName());
             if (found == written.end())
                 return false;
             written.erase(found);
+            forEachChannel(*transform, forgetSamples);
             return true;
         };
         chosen.erase(std::remove_if(chosen.begin(), chosen.end(), known), chosen.end());

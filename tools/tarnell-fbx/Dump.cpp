@@ -56,16 +56,14 @@ public:
             if (!name)
                 break;
             mJson.key(name);
-            print(object.getTransformValue(channel), object.getTransformAnimated(channel),
-                  object.getTransformTime(channel),
-                  [&](float frame) { return object.getTransformValueAt(channel, frame); });
+            print(*object.getTransformChannel(channel));
         }
         mJson.endObject();
     }
 
     /// All channels of a class with named channels of its own.
     template <class Object, class Channel>
-    void channels(Object& object) {
+    void channels(Object& object, TnFbxChannel* (Object::*find)(Channel)) {
         mJson.key("channels");
         mJson.beginObject();
         for (int i = 0;; ++i) {
@@ -74,8 +72,7 @@ public:
             if (!name)
                 break;
             mJson.key(name);
-            print(object.getValue(channel), object.getAnimated(channel), object.getTime(channel),
-                  [&](float frame) { return object.getValueAt(channel, frame); });
+            print(*(object.*find)(channel));
         }
         mJson.endObject();
     }
@@ -84,17 +81,17 @@ public:
         enumerator("projection", {"perspective", "orthographic"}, camera.getProjectionType());
         enumerator("apertureMode", {"horizontalAndVertical", "horizontal", "vertical", "focalLength"},
                    camera.getApertureMode());
-        channels<TnFbxCamera, TnFbxCamera::EFbxCameraChannelType>(camera);
+        channels(camera, &TnFbxCamera::getCameraChannel);
     }
     void details(TnFbxLight& light) {
         enumerator("type", {"point", "directional", "spot"}, light.getLightType());
         enumerator("decay", {"none", "linear", "quadratic", "cubic"}, light.getDecayType());
-        channels<TnFbxLight, TnFbxLight::EFbxLightChannelType>(light);
+        channels(light, &TnFbxLight::getLightChannel);
     }
     void details(TnFbxMarker& marker) {
         number("size", marker.getMarkerSize());
         enumerator("look", {"cube", "hardCross", "lightCross", "sphere"}, marker.getMarkerLookType());
-        channels<TnFbxMarker, TnFbxMarker::EFbxMarkerChannelType>(marker);
+        channels(marker, &TnFbxMarker::getMarkerChannel);
     }
     void details(TnFbxNull& null) {
         number("size", null.getNullSize());
@@ -115,14 +112,14 @@ public:
     }
 
 private:
-    template <class ValueAt>
-    void print(float value, bool animated, const TnFbxTime& time, const ValueAt& valueAt) {
-        if (!animated) {
-            mJson.real(value);
+    void print(const TnFbxChannel& channel) {
+        if (!channel.getAnimated()) {
+            mJson.real(channel.getValue());
             return;
         }
+        const TnFbxTime time = channel.getTime();
         mJson.beginObject();
-        number("value", value);
+        number("value", channel.getValue());
         mJson.key("start");
         mJson.integer(time.getStartFrame());
         mJson.key("end");
@@ -131,12 +128,21 @@ private:
         if (mSamples) {
             mJson.key("samples");
             mJson.beginArray();
-            for (long long frame = time.getStartFrame(); frame <= time.getEndFrame(); ++frame) {
-                mJson.real(valueAt(static_cast<float>(frame)));
-            }
+            samples(channel, time.getStartFrame(), time.getEndFrame());
             mJson.endArray();
         }
         mJson.endObject();
+    }
+
+    void samples(const TnFbxChannel& channel, long long first, long long last) {
+        constexpr long long kMostExact = 1 << 24; // beyond, a float frame can be another one
+        if (channel.isConstant() && first >= -kMostExact && last <= kMostExact) {
+            mJson.reals(channel.getAnimatedValue(static_cast<float>(first)),
+                        static_cast<std::size_t>(last - first + 1));
+            return;
+        }
+        for (long long frame = first; frame <= last; ++frame)
+            mJson.real(channel.getAnimatedValue(static_cast<float>(frame)));
     }
 
     template <class At>

@@ -4,6 +4,8 @@
 // JSON output.
 #include "JsonWriter.h"
 
+#include <algorithm>
+
 #include <nlohmann/json.hpp>
 
 namespace tool {
@@ -15,8 +17,35 @@ void JsonWriter::key(std::string_view name) {
 }
 
 void JsonWriter::text(std::string_view value) {
+    const auto isPlain = [](char c) { return c >= ' ' && c <= '~' && c != '"' && c != '\\'; };
+    if (std::all_of(value.begin(), value.end(), isPlain)) {
+        separate();
+        mOut << '"' << value << '"';
+        return;
+    }
     // Names may hold anything; what is no UTF-8 becomes the replacement character.
     raw(nlohmann::json(std::string(value)).dump(-1, ' ', false, nlohmann::json::error_handler_t::replace));
+}
+
+void JsonWriter::reals(float value, std::size_t count) {
+    constexpr std::size_t kTogether = 512;
+    if (count == 0)
+        return;
+    real(value);
+    std::string next = ","; // what each of the others adds
+    if (mPretty)
+        next += '\n' + std::string(2 * mLevels.size(), ' ');
+    char digits[32];
+    const auto [end, error] = std::to_chars(digits, digits + sizeof digits, value);
+    next += std::isfinite(value) ? std::string_view(digits, static_cast<std::size_t>(end - digits)) : "null";
+
+    std::size_t left = count - 1;
+    std::string block;
+    for (std::size_t i = 0; i < std::min(left, kTogether); ++i)
+        block += next;
+    for (; left >= kTogether; left -= kTogether)
+        mOut << block;
+    mOut << std::string_view(block).substr(0, left * next.size());
 }
 
 void JsonWriter::open(char bracket) {

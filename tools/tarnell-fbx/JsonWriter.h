@@ -31,10 +31,11 @@ public:
     /// A number that is spelt already; null for what is no JSON number (NaN and infinities).
     void digits(std::string_view spelling) { raw(spelling.find_first_of("in") == spelling.npos ? spelling : "null"); }
     void natural(unsigned long long value) { number(value); }
-    void boolean(bool value) { raw(value ? "true" : "false"); }
     /// Shortest digits that read back as the same number; null for NaN and infinities.
     void real(float value) { finite(value); }
     void real(double value) { finite(value); }
+    /// The same value so many times, as elements of an array.
+    void reals(float value, std::size_t count);
 
     // A key and its value.
     void text(std::string_view name, std::string_view value) { key(name), text(value); }

@@ -62,18 +62,43 @@ FbxAMatrix turned(const FbxVector4& angles) {
 }
 
 /// The library decomposes into XYZ, but into ZXY where an object is exactly at the origin.
-FbxAMatrix rotationAt(const TnFbxTransform& object, float frame) {
+struct Rotation {
+    double x = 0.0, y = 0.0, z = 0.0;
+    bool atOrigin = false;
+
+    bool operator==(const Rotation&) const = default;
+};
+
+Rotation rotationAt(const TnFbxTransform& object, float frame) {
     const auto value = [&](int channel) {
         return static_cast<double>(object.getTransformValueAt(static_cast<Channel>(channel), frame));
     };
-    const double x = value(TnFbxTransform::kFbxTransformRotationX), y = value(TnFbxTransform::kFbxTransformRotationY),
-                 z = value(TnFbxTransform::kFbxTransformRotationZ);
     const bool atOrigin = value(TnFbxTransform::kFbxTransformPositionX) == 0.0 &&
                           value(TnFbxTransform::kFbxTransformPositionY) == 0.0 &&
                           value(TnFbxTransform::kFbxTransformPositionZ) == 0.0;
+    return {value(TnFbxTransform::kFbxTransformRotationX), value(TnFbxTransform::kFbxTransformRotationY),
+            value(TnFbxTransform::kFbxTransformRotationZ), atOrigin};
+}
+
+FbxAMatrix matrixOf(const Rotation& rotation) {
+    const auto& [x, y, z, atOrigin] = rotation;
     if (!atOrigin)
         return turned({x, y, z});
     return turned({0, y, 0}) * turned({x, 0, 0}) * turned({0, 0, z});
+}
+
+TnFbxChannel& channelOf(TnFbxTransform& object, int channel) {
+    return *object.getTransformChannel(static_cast<Channel>(channel));
+}
+
+/// Whether neither the position nor the rotation changes.
+bool standsStill(TnFbxTransform& object) {
+    for (int channel = TnFbxTransform::kFbxTransformPositionX; channel <= TnFbxTransform::kFbxTransformRotationZ;
+         ++channel) {
+        if (!channelOf(object, channel).isConstant())
+            return false;
+    }
+    return true;
 }
 
 } // namespace
@@ -154,11 +179,27 @@ void expressInXyz(TnFbxTransform& object) {
     const TnFbxTime range = object.getTransformTime(TnFbxTransform::kFbxTransformRotationX);
     if (!object.getTransformAnimated(TnFbxTransform::kFbxTransformRotationX))
         return;
+    if (standsStill(object)) {
+        const FbxVector4 angles = matrixOf(rotationAt(object, static_cast<float>(range.getStartFrame()))).GetR();
+        for (int axis = 0; axis < 3; ++axis) {
+            TnFbxChannel& channel = channelOf(object, TnFbxTransform::kFbxTransformRotationX + axis);
+            channel.setConstantValues(range, static_cast<float>(angles[axis]));
+            channel.setValue(static_cast<float>(angles[axis]));
+        }
+        object.setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderXYZ);
+        return;
+    }
     Curves rotations;
     FbxVector4 angles;
+    Rotation last;
     for (long long frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
-        const FbxVector4 now = rotationAt(object, static_cast<float>(frame)).GetR();
-        angles = rotations[0].empty() ? now : continued(now, angles);
+        const Rotation now = rotationAt(object, static_cast<float>(frame));
+        if (rotations[0].empty()) {
+            angles = matrixOf(now).GetR();
+        } else if (!(now == last)) {
+            angles = continued(matrixOf(now).GetR(), angles);
+        }
+        last = now;
         append(rotations, angles);
     }
     store(object, Channel::kFbxTransformRotationX, range, rotations);
