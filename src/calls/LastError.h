@@ -4,7 +4,9 @@
 // How the facade and the adapter note the outcome of an operation for `lastError()` and `lastWarnings()`.
 #pragma once
 
+#include <stdexcept>
 #include <string>
+#include <string_view>
 
 namespace Tarnell::Fbx::detail {
 
@@ -14,6 +16,22 @@ bool fail(std::string reason);
 /// The same, with the name of the file in front, unless the reason names it already. `standIn` is the reason when there
 /// is none.
 bool failAbout(const std::string& fileName, const char* reason, const char* standIn);
+
+/// What `work` returns. A fault that the platform throws fails it: that a file was changed while it was read may be
+/// noticed late. A lack of memory goes on to the host.
+///
+/// kept: so does what the platform throws for a layer element without a direct array
+template <class Work>
+bool failOnFault(const std::string& fileName, const Work& work) {
+    try {
+        return work();
+    } catch (const std::runtime_error& fault) {
+        if (std::string_view(fault.what()) == "FbxLayerElementArrayTemplate - mDirectArray is NULL") {
+            throw;
+        }
+        return failAbout(fileName, fault.what(), "cannot be read");
+    }
+}
 
 /// Forgets the last failure. Always true.
 bool succeed();

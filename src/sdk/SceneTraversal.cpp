@@ -290,11 +290,14 @@ bool FbxSdk::walkSubtree(const Walk& walk, fbxsdk::FbxNode* top) {
         mGlobals->sample(*mSamples);
     }
     bool hasRoom = true;
-    detail::walkNodes(top, [&](fbxsdk::FbxNode& node) {
-        hasRoom = visitNode(*this, walk, node);
-        return hasRoom && !walk.found;
+    const bool walked = detail::failOnFault(/*fileName: the fault names it*/ "", [&] {
+        detail::walkNodes(top, [&](fbxsdk::FbxNode& node) {
+            hasRoom = visitNode(*this, walk, node);
+            return hasRoom && !walk.found;
+        });
+        return true;
     });
-    return scope.finish(hasRoom && succeed());
+    return scope.finish(walked && hasRoom && succeed());
 }
 
 // ---- Counting ----

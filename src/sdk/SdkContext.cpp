@@ -164,10 +164,13 @@ bool FbxSdk::loadScene(const std::string& fileName, bool convertGeometry) {
     if (!loadScene(mManager, mScene, fileName)) {
         return false;
     }
-    detail::convertToCentimetres(*mScene);
-    detail::convertToYUp(*mScene);
-    if (convertGeometry) {
-        convertNurbsAndPatchRecursive(mManager, mScene->GetRootNode());
+    const bool converted = detail::failOnFault(fileName, [&] {
+        detail::convertToCentimetres(*mScene);
+        detail::convertToYUp(*mScene);
+        return !convertGeometry || convertNurbsAndPatchRecursive(mManager, mScene->GetRootNode());
+    });
+    if (!converted) {
+        return false;
     }
     initCreateAnimationStack();
     mFileName = fileName;

@@ -173,11 +173,14 @@ bool FbxCache::OpenFileForRead(FbxStatus* pStatus) {
     for (const std::string& place : places) {
         auto file = std::make_unique<detail::CacheFile>();
         FbxStatus status;
-        if (format == eMayaCache) {
-            file->mayaReader = detail::MayaCacheReader::open(place, status);
-        } else {
-            file->pointReader = detail::PointCacheReader::open(place, status);
-        }
+        detail::faultToStatus(status, [&] {
+            if (format == eMayaCache) {
+                file->mayaReader = detail::MayaCacheReader::open(place, status);
+            } else {
+                file->pointReader = detail::PointCacheReader::open(place, status);
+            }
+            return true;
+        });
         if (file->mayaReader || file->pointReader) {
             mFile = std::move(file);
             outcome.status.Clear();
@@ -325,8 +328,10 @@ bool FbxCache::Read(int pChannelIndex, FbxTime& pTime, double* pBuffer, unsigned
         return outcome.fail(FbxStatus::eIndexOutOfRange, "no channel of that index");
     }
     const std::string& channel = channels[static_cast<std::size_t>(pChannelIndex)].name;
-    return mFile->mayaReader->read(channel, pTime.GetSecondDouble(), {pBuffer, std::size_t{pPointCount} * 3},
-                                   outcome.status);
+    return detail::faultToStatus(outcome.status, [&] {
+        return mFile->mayaReader->read(channel, pTime.GetSecondDouble(), {pBuffer, std::size_t{pPointCount} * 3},
+                                       outcome.status);
+    });
 }
 
 bool FbxCache::Read(int pChannelIndex, FbxTime& pTime, float* pBuffer, unsigned int pPointCount, FbxStatus* pStatus) {
@@ -429,8 +434,10 @@ bool FbxCache::Read(unsigned int pFrameIndex, double* pBuffer, unsigned int pPoi
     Outcome outcome(pStatus);
     if (!mFile || !mFile->pointReader || !pBuffer)
         return outcome.fail(FbxStatus::eFailure, detail::kNotMax);
-    return mFile->pointReader->read(detail::frameOf(pFrameIndex), {pBuffer, std::size_t{pPointCount} * 3}) ||
-           outcome.fail(FbxStatus::eInvalidParameter, "the cache has another number of points");
+    return detail::faultToStatus(outcome.status, [&] {
+        return mFile->pointReader->read(detail::frameOf(pFrameIndex), {pBuffer, std::size_t{pPointCount} * 3}) ||
+               outcome.fail(FbxStatus::eInvalidParameter, "the cache has another number of points");
+    });
 }
 
 bool FbxCache::Write(unsigned int pFrameIndex, double* pBuffer, FbxStatus* pStatus) {

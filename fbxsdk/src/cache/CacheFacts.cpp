@@ -16,14 +16,24 @@
 #include "cache/CacheSearch.h"
 #include "cache/MayaCache.h"
 #include "container/ByteOrder.h"
-#include "container/MappedFile.h"
+#include "container/FileBytes.h"
 #include "scene/SceneData.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace extensions {
 namespace {
 
-using detail::MappedFile;
+using detail::FileBytes;
+
+/// The file with all of its bytes in memory; null, and the reason in the status, when it cannot be read.
+std::shared_ptr<const FileBytes> wholeFile(const std::string& name, FbxStatus& status) {
+    auto file = FileBytes::open(name, status);
+    const bool read = file && detail::faultToStatus(status, [&file] {
+        file->fetch(file->bytes());
+        return true;
+    });
+    return read ? file : nullptr;
+}
 
 constexpr std::string_view kMaxMagic("POINTCACHE2\0", 12);
 constexpr std::size_t kMaxHeaderBytes = 32;
@@ -96,7 +106,7 @@ private:
 
     void readFile(const std::string& name, std::optional<std::int32_t> ticks) {
         FbxStatus status;
-        const auto file = MappedFile::open(name, status);
+        const auto file = wholeFile(name, status);
         if (!file) {
             fault(name, 0, status.GetErrorString());
             return;
@@ -278,7 +288,7 @@ std::string descriptionOf(const std::string& dataFile) {
 bool readCacheFacts(const char* fileName, bool verify, CacheFacts& facts, FbxStatus& status) {
     facts = {};
     const std::string name = fileName ? fileName : "";
-    const auto file = MappedFile::open(name, status);
+    const auto file = wholeFile(name, status);
     if (!file)
         return false;
     const std::string_view text(file->bytes().data(), file->bytes().size());

@@ -5,10 +5,13 @@
 #include "cache/MayaCache.h"
 
 #include <algorithm>
+#include <cerrno>
 #include <charconv>
 #include <cmath>
 #include <filesystem>
-#include <system_error>
+#include <new>
+
+#include <dirent.h>
 
 #include "cache/SampleCheck.h"
 
@@ -17,6 +20,30 @@ namespace detail {
 namespace {
 
 namespace fs = std::filesystem;
+
+/// The names in a folder; none where it cannot be read. The standard library's iterator ends the process when it runs
+/// out of memory.
+class Folder {
+public:
+    explicit Folder(const char* path) : mFolder(::opendir(path)) {
+        if (!mFolder && errno == ENOMEM)
+            throw std::bad_alloc();
+    }
+    Folder(const Folder&) = delete;
+    Folder& operator=(const Folder&) = delete;
+    ~Folder() {
+        if (mFolder)
+            ::closedir(mFolder);
+    }
+    /// Null behind the last one.
+    [[nodiscard]] const char* next() {
+        const dirent* const entry = mFolder ? ::readdir(mFolder) : nullptr;
+        return entry ? entry->d_name : nullptr;
+    }
+
+private:
+    DIR* mFolder;
+};
 
 constexpr std::string_view kFloatVectors = "FloatVectorArray";
 
@@ -66,15 +93,15 @@ std::string mayaCacheBase(const std::string& descriptionFile) {
 std::map<std::int32_t, std::string> mayaFrameFiles(const std::string& base, const MayaCacheDescription& description) {
     std::map<std::int32_t, std::string> files;
     const fs::path basePath(base);
-    std::error_code error;
-    for (fs::directory_iterator entry(basePath.parent_path().empty() ? "." : basePath.parent_path(), error), end;
-         !error && entry != end; entry.increment(error)) {
-        const fs::path& file = entry->path();
+    const fs::path folder = basePath.parent_path().empty() ? "." : basePath.parent_path();
+    Folder entries(folder.c_str());
+    while (const char* name = entries.next()) {
+        const fs::path file(name);
         std::int32_t ticks = 0;
         if (file.extension() != description.dataExtension())
             continue;
         if (frameFileTicks(file.stem().string(), basePath.filename().string(), description.ticksPerFrame, ticks))
-            files.try_emplace(ticks, file.string());
+            files.try_emplace(ticks, (folder / file).string());
     }
     return files;
 }
@@ -100,10 +127,10 @@ std::unique_ptr<MayaCacheReader> MayaCacheReader::open(const std::string& descri
 
 void MayaCacheReader::openOneFile(const std::string& base, FbxStatus& status) {
     const std::string file = base + mDescription.dataExtension();
-    mData = MappedFile::open(file, status);
+    mData = FileBytes::open(file, status);
     if (!mData)
         return;
-    MayaCacheData data = parseMayaCacheData(mData->bytes());
+    MayaCacheData data = parseMayaCacheData(mData->bytes(), mData.get());
     // What is missing would read as the last sample that is there.
     if (data.end < mData->bytes().size()) {
         status.SetCode(FbxStatus::eInvalidFile, "%s: offset %zu: cut off or damaged", file.c_str(), data.end);
@@ -117,14 +144,14 @@ void MayaCacheReader::openOneFile(const std::string& base, FbxStatus& status) {
 
 bool MayaCacheReader::readSample(const Sample& sample, const std::string& channel, std::span<double> points,
                                  FbxStatus& status) {
-    std::shared_ptr<const MappedFile> file;
+    std::shared_ptr<const FileBytes> file = mData;
     std::vector<MayaCacheFrame> frames;
     const MayaCacheFrame* frame = &sample.frame;
     if (!sample.file.empty()) {
-        file = MappedFile::open(sample.file, status);
+        file = FileBytes::open(sample.file, status);
         if (!file)
             return false;
-        frames = parseMayaCacheData(file->bytes()).frames;
+        frames = parseMayaCacheData(file->bytes(), file.get()).frames;
         if (frames.empty()) {
             status.SetCode(FbxStatus::eInvalidFile, "%s: no sample in it", sample.file.c_str());
             return false;
@@ -134,7 +161,7 @@ bool MayaCacheReader::readSample(const Sample& sample, const std::string& channe
     for (const MayaCacheBlock& block : frame->blocks) {
         if (block.channel != channel)
             continue;
-        if (readMayaCacheBlock(block, points))
+        if (readMayaCacheBlock(block, points, file.get()))
             return true;
         status.SetCode(FbxStatus::eInvalidParameter, "channel %s has %llu points, not %zu", channel.c_str(),
                        static_cast<unsigned long long>(block.elementCount), points.size() / 3);

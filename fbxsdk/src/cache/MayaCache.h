@@ -12,7 +12,7 @@
 
 #include "cache/MayaCacheData.h"
 #include "cache/MayaCacheDescription.h"
-#include "container/MappedFile.h"
+#include "container/FileBytes.h"
 #include "container/OutputFile.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -47,7 +47,7 @@ private:
 
     MayaCacheDescription mDescription;
     std::map<std::int32_t, Sample> mSamples; ///< by tick
-    std::shared_ptr<const MappedFile> mData; ///< of caches in one file
+    std::shared_ptr<const FileBytes> mData;  ///< of caches in one file
 };
 
 /// A cache in one file, of one or more channels. Its two files appear in close(), or never, or together with others

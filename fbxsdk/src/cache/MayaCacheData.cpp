@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Chunks of Maya cache data, read from mapped bytes and written to strings.
+// Chunks of Maya cache data, read from files and written to strings.
 #include "cache/MayaCacheData.h"
 
 #include <algorithm>
@@ -9,6 +9,7 @@
 #include <cstdint>
 
 #include "container/ByteOrder.h"
+#include "container/FileBytes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -31,9 +32,10 @@ struct Chunk {
 };
 
 /// Takes one chunk off the front. False at the end and at damage.
-bool nextChunk(const Layout& layout, std::span<const char>& rest, Chunk& chunk) {
+bool nextChunk(const Layout& layout, ReadAhead& ahead, std::span<const char>& rest, Chunk& chunk) {
     if (rest.size() < layout.headBytes)
         return false;
+    ahead.need(rest.first(layout.headBytes));
     chunk.tag = std::string_view(rest.data(), 4);
     const std::uint64_t size = layout.alignment == 8 ? loadNumber<std::uint64_t>(rest.data() + 8, kSwap)
                                                      : loadNumber<std::uint32_t>(rest.data() + 4, kSwap);
@@ -47,12 +49,13 @@ bool nextChunk(const Layout& layout, std::span<const char>& rest, Chunk& chunk) 
 }
 
 /// The payload of a group begins with its type and is itself not padded.
-bool nextGroup(const Layout& layout, std::span<const char>& rest, std::string_view& type,
+bool nextGroup(const Layout& layout, ReadAhead& ahead, std::span<const char>& rest, std::string_view& type,
                std::span<const char>& content) {
     Chunk chunk;
     const std::span<const char> before = rest;
-    if (!nextChunk(layout, rest, chunk) || chunk.tag != layout.groupTag || chunk.payload.size() < 4)
+    if (!nextChunk(layout, ahead, rest, chunk) || chunk.tag != layout.groupTag || chunk.payload.size() < 4)
         return false;
+    ahead.need(chunk.payload.first(4));
     rest = before.subspan(layout.headBytes + chunk.payload.size());
     type = std::string_view(chunk.payload.data(), 4);
     content = chunk.payload.subspan(4);
@@ -73,29 +76,43 @@ const DataTag* dataTag(std::string_view tag) {
     return found == std::end(kDataTags) ? nullptr : found;
 }
 
+bool onlyZeros(std::span<const char> bytes, ReadAhead& ahead) {
+    constexpr std::size_t kPiece = std::size_t{1} << 16;
+    for (; !bytes.empty(); bytes = bytes.subspan(std::min(kPiece, bytes.size()))) {
+        const std::span<const char> piece = bytes.first(std::min(kPiece, bytes.size()));
+        ahead.need(piece);
+        if (!std::all_of(piece.begin(), piece.end(), [](char byte) { return byte == '\0'; }))
+            return false;
+    }
+    return true;
+}
+
 std::string_view zeroTerminated(std::span<const char> bytes) {
     const std::string_view text(bytes.data(), bytes.size());
     return text.substr(0, text.find('\0'));
 }
 
-MayaCacheFrame parseFrame(const Layout& layout, std::span<const char> content) {
+MayaCacheFrame parseFrame(const Layout& layout, ReadAhead& ahead, std::span<const char> content) {
     MayaCacheFrame frame;
     std::string_view channel;
     std::uint64_t elements = 0;
     Chunk chunk;
-    while (nextChunk(layout, content, chunk)) {
+    while (nextChunk(layout, ahead, content, chunk)) {
         if (chunk.tag == "TIME" && chunk.payload.size() >= 4) {
+            ahead.need(chunk.payload.first(4));
             frame.hasTime = true;
             frame.ticks = loadNumber<std::int32_t>(chunk.payload.data(), kSwap);
         } else if (chunk.tag == "CHNM") {
+            ahead.need(chunk.payload);
             channel = zeroTerminated(chunk.payload);
         } else if (chunk.tag == "SIZE" && chunk.payload.size() >= 4) {
+            ahead.need(chunk.payload.first(4));
             elements = loadNumber<std::uint32_t>(chunk.payload.data(), kSwap);
-        } else if (const DataTag* tag = dataTag(chunk.tag)) {
-            const std::uint64_t elementBytes = static_cast<std::uint64_t>(tag->components) * (tag->doubles ? 8 : 4);
+        } else if (const DataTag* data = dataTag(chunk.tag)) {
+            const std::uint64_t elementBytes = static_cast<std::uint64_t>(data->components) * (data->doubles ? 8 : 4);
             // The size chunk may lie; the bytes do not.
             const std::uint64_t count = std::min<std::uint64_t>(elements, chunk.payload.size() / elementBytes);
-            frame.blocks.push_back({channel, count, tag->components, tag->doubles, chunk.payload});
+            frame.blocks.push_back({channel, count, data->components, data->doubles, chunk.payload});
         }
     }
     return frame;
@@ -146,30 +163,38 @@ std::string blockBytes(const MayaCacheWriteBlock& block) {
 
 } // namespace
 
-MayaCacheData parseMayaCacheData(std::span<const char> bytes) {
+MayaCacheData parseMayaCacheData(std::span<const char> bytes, const FileBytes* file) {
     MayaCacheData data;
-    const bool wide = bytes.size() >= 4 && std::string_view(bytes.data(), 4) == kWide.groupTag;
+    ReadAhead ahead(bytes, file);
+    ahead.need(bytes.first(std::min(bytes.size(), kWide.groupTag.size())));
+    const bool wide = std::string_view(bytes.data(), bytes.size()).starts_with(kWide.groupTag);
     const Layout& layout = wide ? kWide : kNarrow;
     std::span<const char> rest = bytes;
     std::string_view type;
     std::span<const char> content;
-    while (nextGroup(layout, rest, type, content)) {
+    while (nextGroup(layout, ahead, rest, type, content)) {
         data.end = bytes.size() - rest.size();
         if (type == "MYCH")
-            data.frames.push_back(parseFrame(layout, content));
+            data.frames.push_back(parseFrame(layout, ahead, content));
     }
-    const auto behind = bytes.subspan(data.end);
-    if (std::all_of(behind.begin(), behind.end(), [](char byte) { return byte == '\0'; }))
+    if (onlyZeros(bytes.subspan(data.end), ahead))
         data.end = bytes.size();
     return data;
 }
 
-bool readMayaCacheBlock(const MayaCacheBlock& block, std::span<double> destination) {
+bool readMayaCacheBlock(const MayaCacheBlock& block, std::span<double> destination, const FileBytes* file) {
     if (block.componentCount != 3 || block.elementCount * 3 != destination.size())
         return false;
+    const char* from = block.bytes.data();
+    if (file) { // to the end of the destination, from where they are moved apart from the front on
+        const std::size_t size = destination.size() * (block.doubles ? 8 : 4);
+        char* const to = reinterpret_cast<char*>(destination.data()) + destination.size_bytes() - size;
+        file->read(block.bytes.first(size), to);
+        from = to;
+    }
     for (std::size_t i = 0; i < destination.size(); ++i) {
-        destination[i] = block.doubles ? loadNumber<double>(block.bytes.data() + i * 8, kSwap)
-                                       : static_cast<double>(loadNumber<float>(block.bytes.data() + i * 4, kSwap));
+        destination[i] = block.doubles ? loadNumber<double>(from + i * 8, kSwap)
+                                       : static_cast<double>(loadNumber<float>(from + i * 4, kSwap));
     }
     return true;
 }

@@ -27,6 +27,8 @@ namespace detail {
 inline constexpr std::size_t kMostMayaChannelName = std::size_t{1} << 20;
 
 /// The numbers of one channel at one time.
+class FileBytes;
+
 struct MayaCacheBlock {
     std::string_view channel;
     std::uint64_t elementCount = 0; ///< points of a vector array
@@ -47,12 +49,14 @@ struct MayaCacheData {
     /// Where the file is cut off or damaged; behind its last byte when it is sound.
     std::size_t end = 0;
 };
-/// Cuts a data file into its frames. Zeros behind the last one are no damage.
-[[nodiscard]] MayaCacheData parseMayaCacheData(std::span<const char> bytes);
+/// Cuts a data file into its frames. Zeros behind the last one are no damage. Where the bytes are those of a file, they
+/// are fetched, except the numbers. Throws FileFault.
+[[nodiscard]] MayaCacheData parseMayaCacheData(std::span<const char> bytes, const FileBytes* file = nullptr);
 
 /// Reads the first points of a block, widened to double or narrowed to float. False when the block is no vector array
-/// or has another number of points.
-[[nodiscard]] bool readMayaCacheBlock(const MayaCacheBlock& block, std::span<double> destination);
+/// or has another number of points. Throws FileFault.
+[[nodiscard]] bool readMayaCacheBlock(const MayaCacheBlock& block, std::span<double> destination,
+                                      const FileBytes* file = nullptr);
 
 /// The bytes of the opening CACH group, and of one MYCH group. `ticks` is null in files of a single sample.
 [[nodiscard]] std::string mayaCacheHeader(bool wide, std::int32_t start, std::int32_t end);

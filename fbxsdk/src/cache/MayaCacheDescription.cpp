@@ -13,7 +13,7 @@
 
 #include <pugixml.hpp>
 
-#include "container/MappedFile.h"
+#include "container/FileBytes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -91,7 +91,7 @@ struct TextWriter : pugi::xml_writer {
 } // namespace
 
 bool readMayaCacheDescription(const std::string& fileName, MayaCacheDescription& description, FbxStatus& status) {
-    const auto file = MappedFile::open(fileName, status);
+    const auto file = FileBytes::open(fileName, status);
     if (!file)
         return false;
     if (file->bytes().size() > kMaximumBytes) {
@@ -99,8 +99,12 @@ bool readMayaCacheDescription(const std::string& fileName, MayaCacheDescription&
                        file->bytes().size());
         return false;
     }
+    file->fetch(file->bytes());
+    file->requireUnchanged();
     pugi::xml_document document;
     const pugi::xml_parse_result parsed = document.load_buffer(file->bytes().data(), file->bytes().size());
+    if (parsed.status == pugi::status_out_of_memory)
+        throw std::bad_alloc();
     if (!parsed) {
         status.SetCode(FbxStatus::eInvalidFile, "%s: offset %td: %s", fileName.c_str(), parsed.offset,
                        parsed.description());

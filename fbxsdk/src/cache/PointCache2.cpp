@@ -10,6 +10,7 @@
 #include <cmath>
 #include <cstdint>
 #include <cstring>
+#include <vector>
 
 #include "cache/SampleCheck.h"
 #include "container/ByteOrder.h"
@@ -57,10 +58,11 @@ const char* headerFault(const PointCacheHeader& header) {
 
 std::unique_ptr<PointCacheReader> PointCacheReader::open(const std::string& fileName, FbxStatus& status) {
     auto reader = std::make_unique<PointCacheReader>();
-    reader->mFile = MappedFile::open(fileName, status);
+    reader->mFile = FileBytes::open(fileName, status);
     if (!reader->mFile)
         return nullptr;
     const std::span<const char> bytes = reader->mFile->bytes();
+    reader->mFile->fetch(bytes.first(std::min(bytes.size(), kHeaderBytes)));
     if (bytes.size() < kHeaderBytes || std::memcmp(bytes.data(), kMagic, sizeof kMagic) != 0) {
         status.SetCode(FbxStatus::eInvalidFile, "%s: offset 0: not a point cache", fileName.c_str());
         return nullptr;
@@ -82,8 +84,13 @@ std::unique_ptr<PointCacheReader> PointCacheReader::open(const std::string& file
     return reader;
 }
 
-float PointCacheReader::number(std::uint64_t sample, std::size_t index) const {
-    return loadNumber<float>(mFile->bytes().data() + kHeaderBytes + sample * sampleBytes(mHeader) + index * 4, kSwap);
+/// Floats are read to the end of the points and moved apart from the front on.
+void PointCacheReader::readSample(std::uint64_t sample, std::span<double> points) const {
+    char* const floats = reinterpret_cast<char*>(points.data()) + points.size() * (sizeof(double) - sizeof(float));
+    mFile->read(mFile->bytes().subspan(kHeaderBytes + sample * sampleBytes(mHeader), points.size() * sizeof(float)),
+                floats);
+    for (std::size_t i = 0; i < points.size(); ++i)
+        points[i] = static_cast<double>(loadNumber<float>(floats + i * sizeof(float), kSwap));
 }
 
 bool PointCacheReader::read(double frame, std::span<double> points) const {
@@ -93,9 +100,12 @@ bool PointCacheReader::read(double frame, std::span<double> points) const {
     const double place = std::clamp((frame - mHeader.startFrame) / mHeader.framesPerSample, 0.0, last);
     const auto sample = static_cast<std::uint64_t>(place);
     const double part = place - static_cast<double>(sample);
-    for (std::size_t i = 0; i < points.size(); ++i) {
-        const auto value = static_cast<double>(number(sample, i));
-        points[i] = part > 0.0 ? value + part * (static_cast<double>(number(sample + 1, i)) - value) : value;
+    readSample(sample, points);
+    if (part > 0.0) {
+        std::vector<double> next(points.size());
+        readSample(sample + 1, next);
+        for (std::size_t i = 0; i < points.size(); ++i)
+            points[i] += part * (next[i] - points[i]);
     }
     return true;
 }

@@ -11,7 +11,7 @@
 #include <span>
 #include <string>
 
-#include "container/MappedFile.h"
+#include "container/FileBytes.h"
 #include "container/OutputFile.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -29,13 +29,13 @@ public:
     [[nodiscard]] static std::unique_ptr<PointCacheReader> open(const std::string& fileName, FbxStatus& status);
     [[nodiscard]] const PointCacheHeader& header() const { return mHeader; }
     /// The points at a frame, between samples in a straight line, outside them the nearest one. False when the cache
-    /// has another number of points.
+    /// has another number of points. Throws FileFault.
     [[nodiscard]] bool read(double frame, std::span<double> points) const;
 
 private:
-    [[nodiscard]] float number(std::uint64_t sample, std::size_t index) const;
+    void readSample(std::uint64_t sample, std::span<double> points) const;
 
-    std::shared_ptr<const MappedFile> mFile;
+    std::shared_ptr<const FileBytes> mFile;
     PointCacheHeader mHeader;
 };
 

@@ -83,5 +83,13 @@ bool isAscii(std::span<const char> bytes) {
            std::find(std::begin(kFirstRecords), std::end(kFirstRecords), name) != std::end(kFirstRecords);
 }
 
+bool mayBeginAscii(std::span<const char> bytes) {
+    constexpr std::ptrdiff_t kLongestName = 64;
+    const char* const end = bytes.data() + bytes.size();
+    const char* const name = readPreamble(bytes).end;
+    const char* const nameEnd = tokenEnd(name, end);
+    return nameEnd - name <= kLongestName && skipBlanks(nameEnd, end) == end;
+}
+
 } // namespace detail
 FBXSDK_NAMESPACE_END

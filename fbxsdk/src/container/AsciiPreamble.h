@@ -23,6 +23,8 @@ struct AsciiPreamble {
 
 /// Whether the bytes look like an ASCII file: a comment that states a version, or a first record that starts one.
 [[nodiscard]] bool isAscii(std::span<const char> bytes);
+/// Whether bytes that do not might with more of the file behind them.
+[[nodiscard]] bool mayBeginAscii(std::span<const char> bytes);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -16,6 +16,7 @@
 #include <vector>
 
 #include "container/ByteOrder.h"
+#include "container/FileBytes.h"
 #include "container/NumberDecoding.h"
 #include "container/ReadLimits.h"
 #include "container/ZlibStream.h"
@@ -86,7 +87,7 @@ struct OpenBlock {
 class BinaryReader {
 public:
     BinaryReader(std::span<const char> bytes, RecordTree& tree, FbxStatus& status)
-        : mBytes(bytes), mTree(tree), mStatus(status) {}
+        : mBytes(bytes), mAhead(bytes, tree.file.get()), mTree(tree), mStatus(status) {}
 
     bool read() { return readHeader() && readRecords(); }
 
@@ -97,10 +98,12 @@ private:
     }
 
     template <class Number>
-    [[nodiscard]] Number numberAt(std::size_t offset) const {
+    [[nodiscard]] Number numberAt(std::size_t offset) {
+        mAhead.need(offset, sizeof(Number));
         return loadNumber<Number>(mBytes.data() + offset, mSwap);
     }
-    [[nodiscard]] std::string_view textAt(std::size_t offset, std::size_t size) const {
+    [[nodiscard]] std::string_view textAt(std::size_t offset, std::size_t size) {
+        mAhead.need(offset, size);
         return {mBytes.data() + offset, size};
     }
 
@@ -120,9 +123,11 @@ private:
     bool readLetter(Value& value, std::size_t end);
     bool readText(Value& value, Value::Type type, std::size_t end);
     bool readArray(Value& value, StoredArray::Element element, std::size_t end);
+    void keepPayload(StoredArray& array, std::size_t size);
     bool checkArray(const StoredArray& array, std::size_t offset);
 
     std::span<const char> mBytes;
+    ReadAhead mAhead;
     RecordTree& mTree;
     FbxStatus& mStatus;
     bool mSwap = false;
@@ -136,7 +141,7 @@ bool BinaryReader::readHeader() {
     if (mBytes.size() < kHeaderSize) {
         return fail(mBytes.size(), "the file ends within its header");
     }
-    mTree.bigEndian = mBytes[kByteOrderOffset] != 0;
+    mTree.bigEndian = numberAt<std::uint8_t>(kByteOrderOffset) != 0;
     mSwap = needsSwap(mTree.bigEndian);
     mTree.version = numberAt<std::uint32_t>(kVersionOffset);
     mWide = mTree.version >= kFirstWideVersion;
@@ -257,7 +262,11 @@ bool BinaryReader::readValues(Record& record, const Head& head, std::size_t end)
 // Before 7.x there are no arrays: a mesh has a scalar per coordinate. If all have the same type, that is an array with
 // a type code before each element.
 bool BinaryReader::readScalarList(Record& record, std::size_t count, std::size_t end) {
-    const ElementCode* const code = count >= kShortestList ? findCode(kListCodes, mBytes[mOffset]) : nullptr;
+    if (count < kShortestList) {
+        return false;
+    }
+    mAhead.need(mOffset, 1);
+    const ElementCode* const code = findCode(kListCodes, mBytes[mOffset]);
     if (code == nullptr) {
         return false;
     }
@@ -265,6 +274,7 @@ bool BinaryReader::readScalarList(Record& record, std::size_t count, std::size_t
     if (count > (end - mOffset) / stride) {
         return false;
     }
+    mAhead.need(mOffset, count * stride);
     for (std::size_t i = 0; i < count; ++i) {
         if (mBytes[mOffset + i * stride] != code->code) {
             return false;
@@ -287,6 +297,7 @@ bool BinaryReader::readValue(Value& value, std::size_t end) {
     if (mOffset == end) {
         return fail(mOffset, "the record has fewer values than it says");
     }
+    mAhead.need(mOffset, 1);
     const char code = mBytes[mOffset++];
     const bool read = readValueOf(code, value, end);
     value.code = code;
@@ -355,9 +366,18 @@ bool BinaryReader::readText(Value& value, Value::Type type, std::size_t end) {
     if (size > end - mOffset - kSizeBytes) {
         return fail(mOffset, "text of " + std::to_string(size) + " bytes exceeds its record");
     }
-    value = Value::ofText(textAt(mOffset + kSizeBytes, size));
+    mOffset += kSizeBytes;
+    if (type == Value::Type::raw && size > kMostReadAlong) {
+        StoredArray& array = mTree.newArray();
+        array.element = StoredArray::Element::int8;
+        array.count = size;
+        keepPayload(array, size);
+        value = Value::ofArray(array);
+        return true;
+    }
+    value = Value::ofText(textAt(mOffset, size));
     value.type = type;
-    mOffset += kSizeBytes + size;
+    mOffset += size;
     return true;
 }
 
@@ -381,10 +401,20 @@ bool BinaryReader::readArray(Value& value, StoredArray::Element element, std::si
     array.compressed = encoding == 1;
     array.bigEndian = mTree.bigEndian;
     array.count = count;
-    array.bytes = mBytes.subspan(start + kHeadBytes, size);
+    mOffset += kHeadBytes;
+    keepPayload(array, size);
     value = Value::ofArray(array);
-    mOffset += kHeadBytes + size;
     return checkArray(array, start);
+}
+
+void BinaryReader::keepPayload(StoredArray& array, std::size_t size) {
+    array.bytes = mBytes.subspan(mOffset, size);
+    if (size > kMostReadAlong) {
+        array.file = mTree.file.get();
+    } else {
+        mAhead.need(mOffset, size);
+    }
+    mOffset += size;
 }
 
 bool BinaryReader::checkArray(const StoredArray& array, std::size_t offset) {

@@ -8,10 +8,10 @@
 #include <charconv>
 #include <cstring>
 #include <memory>
-#include <new>
 #include <type_traits>
 
 #include "container/ByteOrder.h"
+#include "container/FileBytes.h"
 #include "container/NumberConversion.h"
 #include "container/NumberText.h"
 #include "container/ZlibStream.h"
@@ -69,19 +69,44 @@ void convertBytes(const StoredArray& array, const char* source, std::span<Number
 }
 
 template <class Number>
-bool inflateArray(const StoredArray& array, std::span<Number> destination) {
+constexpr StoredArray::Element kElementOf = StoredArray::Element::text; // none
+template <>
+constexpr StoredArray::Element kElementOf<double> = StoredArray::Element::float64;
+template <>
+constexpr StoredArray::Element kElementOf<float> = StoredArray::Element::float32;
+template <>
+constexpr StoredArray::Element kElementOf<std::uint32_t> = StoredArray::Element::float32;
+template <>
+constexpr StoredArray::Element kElementOf<std::int32_t> = StoredArray::Element::int32;
+template <>
+constexpr StoredArray::Element kElementOf<std::int64_t> = StoredArray::Element::int64;
+
+/// Elements that a file has just as they are asked for go straight to where they are wanted.
+template <class Number>
+bool readDirectly(const StoredArray& array, std::span<Number> destination) {
+    if (array.file == nullptr || array.element != kElementOf<Number> || array.stride != 0 ||
+        needsSwap(array.bigEndian)) {
+        return false;
+    }
+    array.file->read(array.bytes.first(destination.size_bytes()),
+                     static_cast<char*>(static_cast<void*>(destination.data())));
+    return true;
+}
+
+template <class Number>
+bool inflateArray(const StoredArray& array, std::span<const char> stream, std::span<Number> destination) {
     const std::size_t size = static_cast<std::size_t>(array.count) * elementSize(array.element);
     if (destination.size() == array.count && size <= destination.size_bytes()) {
         // The tail of the destination serves as the buffer: widening from front to back never overtakes what it reads.
         char* const tail = static_cast<char*>(static_cast<void*>(destination.data())) + destination.size_bytes() - size;
-        if (!inflateExactly(array.bytes, {tail, size})) {
+        if (!inflateExactly(stream, {tail, size})) {
             return false;
         }
         convertBytes(array, tail, destination);
         return true;
     }
-    const std::unique_ptr<char[]> buffer(new (std::nothrow) char[size]);
-    if (!buffer || !inflateExactly(array.bytes, {buffer.get(), size})) {
+    const auto buffer = std::make_unique_for_overwrite<char[]>(size);
+    if (!inflateExactly(stream, {buffer.get(), size})) {
         return false;
     }
     convertBytes(array, buffer.get(), destination);
@@ -166,6 +191,15 @@ std::size_t elementSize(StoredArray::Element element) {
     return 1;
 }
 
+std::span<const char> payloadOf(const StoredArray& array, std::unique_ptr<char[]>& memory) {
+    if (array.file == nullptr) {
+        return array.bytes;
+    }
+    memory = std::make_unique_for_overwrite<char[]>(array.bytes.size());
+    array.file->read(array.bytes, memory.get());
+    return {memory.get(), array.bytes.size()};
+}
+
 template <class Number>
 bool decodeArray(const StoredArray& array, std::span<Number> destination) {
     if (destination.empty()) {
@@ -174,10 +208,15 @@ bool decodeArray(const StoredArray& array, std::span<Number> destination) {
     if (array.element == StoredArray::Element::text) {
         return parseText(array, destination);
     }
-    if (array.compressed) {
-        return inflateArray(array, destination);
+    if (!array.compressed && readDirectly(array, destination)) {
+        return true;
     }
-    convertBytes(array, array.bytes.data(), destination);
+    std::unique_ptr<char[]> memory;
+    const std::span<const char> payload = payloadOf(array, memory);
+    if (array.compressed) {
+        return inflateArray(array, payload, destination);
+    }
+    convertBytes(array, payload.data(), destination);
     return true;
 }
 

@@ -5,6 +5,7 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <span>
 
 #include "container/Record.h"
@@ -19,9 +20,13 @@ namespace detail {
 ///
 /// An array is inflated straight into the destination, and widened or swapped there; only narrowing and partial reads
 /// go through a temporary of the array's size. False when the array is corrupt; the destination is then undefined.
+/// Throws FileFault where the file cannot be read any more, and std::bad_alloc.
 /// std::uint32_t asks for the bits of 32-bit floats.
 template <class Number>
 [[nodiscard]] bool decodeArray(const StoredArray& array, std::span<Number> destination);
+
+/// The payload is where the array says, read from the file if need be. `memory` keeps it.
+[[nodiscard]] std::span<const char> payloadOf(const StoredArray& array, std::unique_ptr<char[]>& memory);
 
 extern template bool decodeArray(const StoredArray&, std::span<double>);
 extern template bool decodeArray(const StoredArray&, std::span<float>);

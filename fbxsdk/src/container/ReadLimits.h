@@ -26,5 +26,13 @@ inline constexpr std::size_t kMaxDepth = 64;
 /// matrix, shorter than anything that is worth the bytes.
 inline constexpr std::size_t kShortestList = 17;
 
+/// Arrays up to so many bytes are read along with the records around them, larger ones when somebody asks for them.
+inline constexpr std::size_t kMostReadAlong = std::size_t{1} << 14;
+
+/// What comes through a pipe is held in memory until it has been read.
+inline constexpr std::size_t kMostPipeBytes = std::size_t{1} << 32;
+/// Milliseconds without a byte, after which whoever should write into a pipe counts as gone.
+inline constexpr int kMostPipeSilence = 60'000;
+
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -2,8 +2,8 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The record tree that both containers, binary and ASCII, are cut into. After this stage nobody knows which one a file
-// was. Records and values point into the mapped file (or into the tree's own text store), so a tree lives exactly as
-// long as its RecordTree.
+// was. Records and values point into the bytes of the file (or into the tree's own text store), so a tree lives exactly
+// as long as its RecordTree.
 #pragma once
 
 #include <cstdint>
@@ -21,6 +21,8 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+class FileBytes;
+
 /// A numeric array as the file stores it; decoded by readNumbers only when somebody asks.
 struct StoredArray {
     /// int8 holds booleans and bytes and counts from 0 to 255.
@@ -32,7 +34,8 @@ struct StoredArray {
     std::uint8_t stride = 0;  ///< bytes from one element to the next; 0 when they are packed
     std::uint64_t count =
         0; ///< elements; already checked against the bytes (deflate cannot expand further than 1032:1)
-    std::span<const char> bytes; ///< the payload in the file; for `text` the source text of the list
+    std::span<const char> bytes;     ///< the payload in the file; for `text` the source text of the list
+    const FileBytes* file = nullptr; ///< where the payload has to be read from first; null when it is there
 };
 
 /// One value of a record. Whole numbers and reals convert into each other; text never converts into a number.
@@ -109,7 +112,8 @@ struct Record {
     [[nodiscard]] std::size_t numberCount() const;
     /// Decodes the first destination.size() numbers straight into the destination, converting where the stored type
     /// differs (reals to whole numbers by truncation with saturation). False when a compressed array is corrupt or the
-    /// record has fewer numbers; the destination is then zero-filled.
+    /// record has fewer numbers; the destination is then zero-filled. Throws FileFault when the file was changed
+    /// meanwhile and std::bad_alloc.
     [[nodiscard]] bool readNumbers(std::span<double> destination) const;
     [[nodiscard]] bool readNumbers(std::span<float> destination) const;
     [[nodiscard]] bool readNumbers(std::span<std::int32_t> destination) const;
@@ -119,9 +123,7 @@ struct Record {
     [[nodiscard]] bool readFloatBits(std::span<std::uint32_t> destination) const;
 };
 
-class MappedFile;
-
-/// A mapped file and the records cut from it.
+/// The bytes of a file and the records cut from it.
 class RecordTree {
 public:
     RecordTree() = default;
@@ -146,21 +148,25 @@ public:
     StoredArray& newArray();
     std::string_view keepText(std::string text);
 
-    std::shared_ptr<const void> mapping;    ///< keeps the bytes alive
-    std::shared_ptr<const MappedFile> file; ///< the mapping, when it is one of a file
+    std::shared_ptr<const void> mapping;   ///< keeps the bytes alive
+    std::shared_ptr<const FileBytes> file; ///< the bytes, when they are those of a file
 
 private:
     std::pmr::monotonic_buffer_resource mMemory{64 * 1024};
     std::deque<std::string> mTexts;
 };
 
-/// Reads a file into a tree: maps it, detects the container by content, cuts it into records.
+/// Reads a file into a tree: detects the container by content and cuts it into records. Large arrays are not read yet.
 ///
 /// Null on failure; the status then says which file, where in it and what is wrong. Arrays are not decoded here.
 [[nodiscard]] std::unique_ptr<RecordTree> readRecords(const std::string& fileName, FbxStatus& status);
 /// The same for bytes in memory, which must outlive the tree. `fileName` is for messages only.
 [[nodiscard]] std::unique_ptr<RecordTree> readRecords(std::span<const char> bytes, const std::string& fileName,
                                                       FbxStatus& status);
+
+enum class Container { binary, ascii, unknown };
+/// Which container a file is; unknown also when it cannot be opened, for which the status has the reason.
+[[nodiscard]] Container containerOf(const std::string& fileName, FbxStatus& status);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -7,7 +7,7 @@
 #include <utility>
 
 #include "container/BinaryReader.h"
-#include "container/MappedFile.h"
+#include "container/FileBytes.h"
 #include "container/Record.h"
 
 FBXSDK_NAMESPACE_BEGIN

@@ -7,6 +7,7 @@
 #include <algorithm>
 #include <cstring>
 #include <memory>
+#include <new>
 
 #include <libdeflate.h>
 
@@ -27,7 +28,7 @@ bool inflateExactly(std::span<const char> stream, std::span<char> destination) {
     const std::unique_ptr<libdeflate_decompressor, decltype(&libdeflate_free_decompressor)> decompressor(
         libdeflate_alloc_decompressor(), &libdeflate_free_decompressor);
     if (!decompressor) {
-        return false;
+        throw std::bad_alloc(); // says nothing about the stream
     }
     // Without a place for the actual size the library insists on the exact one.
     return libdeflate_zlib_decompress(decompressor.get(), stream.data(), stream.size(), destination.data(),

@@ -20,7 +20,8 @@ inline constexpr std::uint64_t kMaxDeflateRatio = 1032;
 
 /// Inflates a zlib stream (RFC 1950) into exactly the bytes of the destination.
 ///
-/// False when the stream is corrupt or holds fewer or more bytes; the destination is then undefined.
+/// False when the stream is corrupt or holds fewer or more bytes; the destination is then undefined. Throws
+/// std::bad_alloc when there is no memory to inflate with.
 [[nodiscard]] bool inflateExactly(std::span<const char> stream, std::span<char> destination);
 
 /// Deflates one array after the other into zlib streams. Animation repeats itself, most of all the times of its keys:

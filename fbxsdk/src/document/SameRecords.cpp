@@ -6,16 +6,24 @@
 
 #include <algorithm>
 #include <bit>
+#include <memory>
 #include <utility>
 #include <vector>
+
+#include "container/NumberDecoding.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
 bool sameArrays(const StoredArray& a, const StoredArray& b) {
-    return a.element == b.element && a.compressed == b.compressed && a.count == b.count &&
-           std::equal(a.bytes.begin(), a.bytes.end(), b.bytes.begin(), b.bytes.end());
+    if (a.element != b.element || a.compressed != b.compressed || a.count != b.count ||
+        a.bytes.size() != b.bytes.size())
+        return false;
+    std::unique_ptr<char[]> memoryOfA, memoryOfB;
+    const std::span<const char> left = payloadOf(a, memoryOfA);
+    const std::span<const char> right = payloadOf(b, memoryOfB);
+    return std::equal(left.begin(), left.end(), right.begin());
 }
 
 bool sameValue(const Value& a, const Value& b) {

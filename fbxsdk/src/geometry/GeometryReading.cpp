@@ -7,7 +7,6 @@
 #include <algorithm>
 #include <vector>
 
-#include "container/MappedFile.h"
 #include "geometry/ItemReading.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -42,13 +41,6 @@ void cutIntoPolygons(PlainArray<int>& corners, PlainArray<int>& starts, int poin
     }
 }
 
-/// The pages that a list was read from are not needed any more.
-void releaseNumbers(const Document& document, const Record& record) {
-    const StoredArray* const array = record.array();
-    if (array && document.tree->file)
-        document.tree->file->release(array->bytes);
-}
-
 /// Adds offsets, three numbers each, to the points that the indices name; without indices to the first points in order.
 void applyOffsets(PlainArray<FbxVector4>& points, const PlainArray<int>* indices, const std::vector<double>& offsets) {
     int count = static_cast<int>(offsets.size() / 3);
@@ -76,7 +68,6 @@ void readMesh(FbxMesh& mesh, const GeometrySource& source) {
         fetchItems(*source.document, *vertices, mesh.points());
     if (const Record* polygons = source.body->child("PolygonVertexIndex")) {
         readItems(*polygons, mesh.polygonVertices());
-        releaseNumbers(*source.document, *polygons);
         cutIntoPolygons(mesh.polygonVertices(), mesh.polygonStarts(), mesh.points().count());
     }
 }

@@ -57,11 +57,9 @@ bool holdsItems(const StoredArray& array) {
 }
 
 /// Null when the array is corrupt.
-std::unique_ptr<StoredBytes> storedBytes(const std::shared_ptr<const MappedFile>& file, const StoredArray& array) {
-    if (!array.compressed)
-        return std::make_unique<MappedBytes>(file, array);
-    auto inflated = std::make_unique<InflatedBytes>(file, array);
-    return inflated->isSound() ? std::move(inflated) : nullptr;
+std::unique_ptr<StoredBytes> storedBytes(const std::shared_ptr<const FileBytes>& file, const StoredArray& array) {
+    auto loaded = std::make_unique<LoadedBytes>(file, array);
+    return loaded->isSound() ? std::move(loaded) : nullptr;
 }
 
 } // namespace
@@ -104,7 +102,7 @@ bool readItems(const Record& record, PlainArray<bool>& items) {
 template <class Item>
 bool fetchItems(const Document& document, const Record& record, PlainArray<Item>& items) {
     const StoredArray* const array = record.array();
-    const std::shared_ptr<const MappedFile>& file = document.tree->file;
+    const std::shared_ptr<const FileBytes>& file = document.tree->file;
     if (!array || !file || !file->contains(array->bytes) || !holdsItems<Item>(*array))
         return readItems(record, items);
     std::unique_ptr<StoredBytes> bytes = storedBytes(file, *array);

@@ -66,10 +66,16 @@ void FbxLayerContainer::detachSource() {
 
 void FbxLayerContainer::loadSource() const {
     // Without its source the object is an ordinary one for whatever the reader calls. The content was there all along:
-    // that it is fetched only now is no change of the object.
+    // that it is fetched only now is no change of the object. What could not be fetched is no empty object, but fails
+    // again for whoever asks next.
     std::unique_ptr<detail::GeometrySource> source = std::move(mSource);
-    if (!const_cast<FbxLayerContainer*>(this)->readSource(*source))
+    try {
+        if (!const_cast<FbxLayerContainer*>(this)->readSource(*source))
+            mSource = std::move(source);
+    } catch (...) {
         mSource = std::move(source);
+        throw;
+    }
 }
 
 void FbxLayerContainer::removeElementEntries(FbxLayerElement::EMappingMode pMappingMode, int pFirst, int pCount) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Arrays that are inflated, let go, and inflated again.
+// Arrays that are read, let go, and read again.
 #include "geometry/StoredBytes.h"
 
 #include <algorithm>
@@ -12,32 +12,37 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-InflatedBytes::InflatedBytes(std::shared_ptr<const MappedFile> file, const StoredArray& array)
-    : mFile(std::move(file)), mStream(array.bytes),
+LoadedBytes::LoadedBytes(std::shared_ptr<const FileBytes> file, const StoredArray& array)
+    : mFile(std::move(file)), mArray(array),
       mMemory(static_cast<std::size_t>(array.count) * elementSize(array.element)) {
-    inflate();
+    load();
 }
 
-void InflatedBytes::inflate() {
-    mSound = inflateExactly(mStream, mMemory.bytes());
-    mFile->release(mStream);
+void LoadedBytes::load() {
+    if (mArray.compressed) {
+        std::unique_ptr<char[]> memory;
+        mSound = inflateExactly(payloadOf(mArray, memory), mMemory.bytes());
+    } else {
+        mFile->read(mArray.bytes, mMemory.bytes().data());
+        mSound = true;
+    }
     if (!mSound)
         std::fill(mMemory.bytes().begin(), mMemory.bytes().end(), '\0');
 }
 
-void InflatedBytes::release(std::span<const char> part) {
+void LoadedBytes::release(std::span<const char> part) {
     if (mStays || part.empty())
         return;
     releasePages(part);
     mIncomplete = true;
 }
 
-void InflatedBytes::restore() {
+void LoadedBytes::restore() {
     if (!mIncomplete)
         return;
+    load();
     mIncomplete = false;
     mStays = true;
-    inflate();
 }
 
 } // namespace detail

@@ -1,12 +1,12 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Packed items that are looked at where a file has them, or where they were inflated to.
+// Packed items of a file, in memory as long as somebody looks at them.
 #pragma once
 
 #include <memory>
 
-#include "container/MappedFile.h"
+#include "container/FileBytes.h"
 #include "container/PageMemory.h"
 #include "container/Record.h"
 
@@ -27,40 +27,26 @@ public:
     virtual void restore() = 0;
 };
 
-/// An array that the file has just so. Released pages come back by themselves.
-class MappedBytes final : public StoredBytes {
+/// An array of a file. It is read, and inflated if need be, when it is made, and a second time when it is restored;
+/// then it stays, so that nobody pays more than twice for reading again and again.
+class LoadedBytes final : public StoredBytes {
 public:
-    MappedBytes(std::shared_ptr<const MappedFile> file, const StoredArray& array)
-        : mFile(std::move(file)), mBytes(array.bytes) {}
-
-    [[nodiscard]] std::span<const char> bytes() const override { return mBytes; }
-    void release(std::span<const char> part) override { mFile->release(part); }
-    void restore() override {}
-
-private:
-    std::shared_ptr<const MappedFile> mFile;
-    std::span<const char> mBytes;
-};
-
-/// A compressed array. It is inflated when it is made, and a second time when it is restored; then it stays, so that
-/// nobody pays more than twice for reading again and again.
-class InflatedBytes final : public StoredBytes {
-public:
-    /// Throws std::bad_alloc when there is no memory.
-    InflatedBytes(std::shared_ptr<const MappedFile> file, const StoredArray& array);
+    /// Throws std::bad_alloc when there is no memory, and FileFault when the file was changed.
+    LoadedBytes(std::shared_ptr<const FileBytes> file, const StoredArray& array);
 
     /// False when the array is corrupt. All bytes are zero then.
     [[nodiscard]] bool isSound() const { return mSound; }
 
     [[nodiscard]] std::span<const char> bytes() const override { return mMemory.bytes(); }
     void release(std::span<const char> part) override;
+    /// Throws as the constructor does, and may be called again.
     void restore() override;
 
 private:
-    void inflate();
+    void load();
 
-    std::shared_ptr<const MappedFile> mFile;
-    std::span<const char> mStream;
+    std::shared_ptr<const FileBytes> mFile;
+    StoredArray mArray;
     PageMemory mMemory;
     bool mSound = false;
     bool mIncomplete = false; ///< some bytes were released

@@ -19,6 +19,7 @@
 
 #include "container/AsciiSink.h"
 #include "container/BinarySink.h"
+#include "container/FileBytes.h"
 #include "container/OutputFile.h"
 #include "scene/ManagerData.h"
 #include "scene/SceneMembers.h"
@@ -156,7 +157,8 @@ bool FbxExporter::Export(FbxDocument* pDocument, bool) {
     const VersionTraits* const chosen = findVersion(mVersion);
     const bool binary = mFileFormat == GetFbxManager()->data().registry.GetNativeWriterFormat();
     try {
-        return writeFile(*scene, mFileName, chosen ? *chosen : kNewestVersion, binary, mStatus);
+        return detail::faultToStatus(
+            mStatus, [&] { return writeFile(*scene, mFileName, chosen ? *chosen : kNewestVersion, binary, mStatus); });
     } catch (const std::bad_alloc&) {
         mStatus.SetCode(FbxStatus::eInsufficientMemory, "%s: there is not enough memory to write it",
                         mFileName.c_str());

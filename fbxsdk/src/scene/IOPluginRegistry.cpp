@@ -11,9 +11,7 @@
 
 #include <fbxsdk/FbxString.h>
 
-#include "container/AsciiPreamble.h"
-#include "container/BinaryReader.h"
-#include "container/MappedFile.h"
+#include "container/Record.h"
 #include "document/VersionTraits.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -65,12 +63,11 @@ int FbxIOPluginRegistry::GetNativeWriterFormat() const { return kBinary; }
 bool FbxIOPluginRegistry::DetectReaderFileFormat(const char* pFileName, int& pFileFormat) const {
     pFileFormat = -1;
     FbxStatus status;
-    const auto file = pFileName ? detail::MappedFile::open(pFileName, status) : nullptr;
-    if (!file)
-        return false;
-    if (detail::isBinary(file->bytes()))
+    const detail::Container container =
+        pFileName ? detail::containerOf(std::string(pFileName), status) : detail::Container::unknown;
+    if (container == detail::Container::binary)
         pFileFormat = kBinary;
-    if (pFileFormat < 0 && detail::isAscii(file->bytes()))
+    if (container == detail::Container::ascii)
         pFileFormat = kAscii;
     return pFileFormat >= 0;
 }

@@ -6,6 +6,7 @@
 
 #include <fbxsdk/FbxScene.h>
 
+#include "container/FileBytes.h"
 #include "document/Document.h"
 #include "scene/ManagerData.h"
 #include "scene/SceneReading.h"
@@ -72,8 +73,8 @@ bool FbxImporter::Initialize(const char* pFileName, int pFileFormat, FbxIOSettin
         mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: there is no reader number %d", pFileName, pFileFormat);
         return false;
     }
-    mDocument = detail::readDocument(mFileName, mStatus);
-    if (!mDocument)
+    const auto readDocument = [&] { return (mDocument = detail::readDocument(mFileName, mStatus)) != nullptr; };
+    if (!detail::faultToStatus(mStatus, readDocument))
         return false;
     mHeader.mFileVersion = static_cast<int>(mDocument->version);
     mHeader.mCreator = FbxString(mDocument->creator.c_str());
@@ -96,7 +97,7 @@ bool FbxImporter::Import(FbxDocument* pDocument, bool) {
     }
     mStatus.Clear();
     std::vector<std::string> notes;
-    if (!detail::readScene(mDocument, *scene, mStatus, &notes))
+    if (!detail::faultToStatus(mStatus, [&] { return detail::readScene(mDocument, *scene, mStatus, &notes); }))
         return false;
     for (const std::string& note : notes)
         mHeader.mWarnings.emplace_back(note.c_str());

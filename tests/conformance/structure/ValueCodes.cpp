@@ -4,7 +4,7 @@
 // A second, small reading of the heads of binary records: end, number and size of the values, name, values.
 #include "ValueCodes.h"
 
-#include "container/MappedFile.h"
+#include "container/FileBytes.h"
 
 #include <cstring>
 #include <span>

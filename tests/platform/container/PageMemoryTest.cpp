@@ -1,17 +1,13 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Pages that are given back: zeros where there is no file behind them, the file's own bytes where there is one.
+// Pages that are given back are zeros.
 #include "container/PageMemory.h"
 
 #include <algorithm>
 #include <new>
-#include <string>
 
 #include <gtest/gtest.h>
-
-#include "container/MappedFile.h"
-#include "support/TemporaryFolder.h"
 
 namespace fbxsdk::detail {
 namespace {
@@ -54,39 +50,6 @@ TEST(PageMemory, KeepsAPageOfWhichOnlyAPartIsReleased) {
     releasePages(memory.bytes().first(0));
 
     EXPECT_EQ(countOf(memory.bytes(), 'x'), kSize);
-}
-
-TEST(MappedFile, ReadsReleasedPagesFromTheFileAgain) {
-    const support::TemporaryFolder folder;
-    std::string content(kSize, '\0');
-    for (std::size_t i = 0; i < kSize; ++i) {
-        content[i] = static_cast<char>(i % 251);
-    }
-    FbxStatus status;
-    const auto file = MappedFile::open(folder.write("file", content), status);
-    ASSERT_TRUE(file);
-
-    file->release(file->bytes());
-    EXPECT_EQ(std::string(file->bytes().begin(), file->bytes().end()), content);
-    file->release(file->bytes().subspan(1000, 500'000));
-    EXPECT_EQ(std::string(file->bytes().begin(), file->bytes().end()), content);
-}
-
-TEST(MappedFile, LeavesMemoryAloneThatIsNotItsOwn) {
-    const support::TemporaryFolder folder;
-    FbxStatus status;
-    const auto file = MappedFile::open(folder.write("file", std::string(kSize, 'f')), status);
-    ASSERT_TRUE(file);
-    const PageMemory other(kSize);
-    std::fill(other.bytes().begin(), other.bytes().end(), 'x');
-
-    EXPECT_FALSE(file->contains(other.bytes()));
-    EXPECT_TRUE(file->contains(file->bytes()));
-    EXPECT_FALSE(file->contains({file->bytes().data(), kSize + 1}));
-    file->release(other.bytes());
-    file->release({});
-
-    EXPECT_EQ(countOf(other.bytes(), 'x'), kSize);
 }
 
 } // namespace

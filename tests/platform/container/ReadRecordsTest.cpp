@@ -55,13 +55,13 @@ TEST_F(ReadRecords, SaysWhyAFileCannotBeOpened) {
     EXPECT_EQ(refusal(path(".")), "cannot be opened: Is a directory");
     EXPECT_EQ(refusal(write("file", "x") + "/below.fbx"), "cannot be opened: Not a directory");
     EXPECT_EQ(refusal(""), "cannot be opened: No such file or directory");
-    EXPECT_EQ(refusal("/dev/null"), "cannot be opened: not a regular file");
+    EXPECT_EQ(refusal("/dev/null"), "cannot be opened: neither a regular file nor a pipe");
 }
 
 TEST_F(ReadRecords, DoesNotWaitForAPipe) {
     ASSERT_EQ(mkfifo(path("pipe.fbx").c_str(), 0600), 0);
 
-    EXPECT_EQ(refusal(path("pipe.fbx")), "cannot be opened: not a regular file");
+    EXPECT_EQ(refusal(path("pipe.fbx")), "cannot be opened: neither a regular file nor a pipe");
 }
 
 TEST_F(ReadRecords, SaysThatAFileMayNotBeRead) {

@@ -241,24 +241,25 @@ TEST(StoredItems, TakeThePlaceOfWhatWasThere) {
     EXPECT_EQ(array.value(1), 1);
 }
 
-class InflatedBytesTest : public testing::Test {
+class LoadedBytesTest : public testing::Test {
 protected:
     static constexpr std::size_t kSize = std::size_t{1} << 20;
 
-    InflatedBytesTest() : mContent(kSize, '\0') {
+    LoadedBytesTest() : mContent(kSize, '\0') {
         for (std::size_t i = 0; i < kSize; ++i) {
             mContent[i] = static_cast<char>(i % 251);
         }
     }
-    InflatedBytes inflated(const std::string& stream) {
+    LoadedBytes inflated(const std::string& stream) {
         FbxStatus status;
-        const auto file = MappedFile::open(mFolder.write("file", stream), status);
+        const auto file = FileBytes::open(mFolder.write("file", stream), status);
         StoredArray array;
         array.element = StoredArray::Element::int8;
         array.compressed = true;
         array.count = kSize;
         array.bytes = file->bytes();
-        return InflatedBytes(file, array);
+        array.file = file.get();
+        return LoadedBytes(file, array);
     }
     static std::string contentOf(const StoredBytes& bytes) { return {bytes.bytes().begin(), bytes.bytes().end()}; }
 
@@ -266,8 +267,8 @@ protected:
     std::string mContent;
 };
 
-TEST_F(InflatedBytesTest, AreInflatedAgainWhenTheyWereReleased) {
-    InflatedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
+TEST_F(LoadedBytesTest, AreInflatedAgainWhenTheyWereReleased) {
+    LoadedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
     EXPECT_TRUE(bytes.isSound());
     EXPECT_EQ(contentOf(bytes), mContent);
 
@@ -278,8 +279,8 @@ TEST_F(InflatedBytesTest, AreInflatedAgainWhenTheyWereReleased) {
     EXPECT_EQ(contentOf(bytes), mContent);
 }
 
-TEST_F(InflatedBytesTest, StayOnceTheyWereInflatedTwice) {
-    InflatedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
+TEST_F(LoadedBytesTest, StayOnceTheyWereInflatedTwice) {
+    LoadedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
     bytes.release(bytes.bytes());
     bytes.restore();
 
@@ -288,11 +289,11 @@ TEST_F(InflatedBytesTest, StayOnceTheyWereInflatedTwice) {
     EXPECT_EQ(contentOf(bytes), mContent);
 }
 
-TEST_F(InflatedBytesTest, OfACorruptStreamAreZero) {
+TEST_F(LoadedBytesTest, OfACorruptStreamAreZero) {
     std::string stream = BinaryRecordBuilder::deflated(mContent);
     stream[stream.size() / 2] = static_cast<char>(stream[stream.size() / 2] ^ 0x55);
 
-    const InflatedBytes bytes = inflated(stream);
+    const LoadedBytes bytes = inflated(stream);
 
     EXPECT_FALSE(bytes.isSound());
     EXPECT_EQ(contentOf(bytes), std::string(kSize, '\0'));

@@ -1,0 +1,202 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Files by positioned reads into memory that is reserved at once and taken page by page.
+#include "container/FileBytes.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <cstdint>
+#include <cstring>
+#include <functional>
+#include <system_error>
+#include <utility>
+
+#include <fcntl.h>
+#include <poll.h>
+#include <sys/mman.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include "container/FileOperations.h"
+#include "container/ReadLimits.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+namespace {
+
+class FileDescriptor {
+public:
+    // Opening a pipe must not wait for somebody to write into it.
+    explicit FileDescriptor(const std::string& fileName)
+        : mNumber(::open(fileName.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK)) {}
+    FileDescriptor(const FileDescriptor&) = delete;
+    FileDescriptor& operator=(const FileDescriptor&) = delete;
+    ~FileDescriptor() {
+        if (mNumber >= 0) {
+            ::close(mNumber);
+        }
+    }
+    [[nodiscard]] int number() const { return mNumber; }
+    [[nodiscard]] int release() { return std::exchange(mNumber, -1); }
+
+private:
+    int mNumber;
+};
+
+std::nullptr_t refuse(const std::string& fileName, const std::string& reason, FbxStatus& status) {
+    status.SetCode(FbxStatus::eFailure, "%s: cannot be opened: %s", fileName.c_str(), reason.c_str());
+    return nullptr;
+}
+
+std::nullptr_t refuse(const std::string& fileName, int error, FbxStatus& status) {
+    return refuse(fileName, std::generic_category().message(error), status);
+}
+
+bool isBefore(const timespec& a, const timespec& b) {
+    return a.tv_sec != b.tv_sec ? a.tv_sec < b.tv_sec : a.tv_nsec < b.tv_nsec;
+}
+
+/// Files are stamped with a clock that stands still for some milliseconds at a time. One that was written in the moment
+/// in which it is opened might be written again without another stamp: such a file is looked at a moment later.
+bool settledFacts(int file, struct stat& facts) {
+    constexpr int kMostTries = 20;
+    constexpr timespec kMoment{0, 1'000'000};
+    for (int i = 0; i < kMostTries; ++i) {
+        timespec now{};
+        ::clock_gettime(CLOCK_REALTIME_COARSE, &now);
+        if (::fstat(file, &facts) != 0)
+            return false;
+        if (!S_ISREG(facts.st_mode) || isBefore(facts.st_mtim, now))
+            break;
+        ::nanosleep(&kMoment, nullptr);
+    }
+    return true;
+}
+
+/// Memory that costs nothing until it is written to.
+std::span<char> reserve(std::size_t size) {
+    void* const memory =
+        ::mmap(nullptr, size, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS | MAP_NORESERVE, -1, 0);
+    return memory == MAP_FAILED ? std::span<char>() : std::span(static_cast<char*>(memory), size);
+}
+
+/// The error number, or 0 when there is something to read, be it the end.
+int waitForBytes(int pipe) {
+    pollfd waiting{pipe, POLLIN, 0};
+    const int ready = ::poll(&waiting, 1, kMostPipeSilence);
+    if (ready < 0)
+        return errno == EINTR ? 0 : errno;
+    return ready == 0 ? ETIMEDOUT : 0;
+}
+
+/// Appends what comes through a pipe to the memory. The error number, EFBIG when it is more than that.
+int readPipe(int pipe, std::span<char> memory, std::size_t& size) {
+    for (size = 0; size < memory.size();) {
+        const ssize_t count = ::read(pipe, memory.data() + size, std::min(memory.size() - size, std::size_t{1} << 20));
+        if (count > 0) {
+            size += static_cast<std::size_t>(count);
+        } else if (count == 0) {
+            return 0;
+        } else if (const int error = errno == EAGAIN ? waitForBytes(pipe) : errno; error != 0 && error != EINTR) {
+            return error;
+        }
+    }
+    return EFBIG;
+}
+
+} // namespace
+
+FileBytes::~FileBytes() {
+    if (mFile >= 0)
+        ::close(mFile);
+    if (!mMemory.empty())
+        ::munmap(mMemory.data(), mMemory.size());
+}
+
+std::shared_ptr<const FileBytes> FileBytes::open(const std::string& fileName, FbxStatus& status) {
+    FileDescriptor file(fileName);
+    struct stat facts = {};
+    if (file.number() < 0 || !settledFacts(file.number(), facts)) {
+        return refuse(fileName, errno, status);
+    }
+    if (S_ISDIR(facts.st_mode)) {
+        return refuse(fileName, EISDIR, status);
+    }
+    const bool isPipe = S_ISFIFO(facts.st_mode);
+    if (!S_ISREG(facts.st_mode) && !isPipe) {
+        return refuse(fileName, "neither a regular file nor a pipe", status);
+    }
+    const std::shared_ptr<FileBytes> opened(new FileBytes); // first, so that nothing can fail behind the reservation
+    opened->mName = fileName;
+    std::size_t size = isPipe ? kMostPipeBytes : static_cast<std::size_t>(facts.st_size);
+    if (size != 0) {
+        opened->mMemory = reserve(size);
+        if (opened->mMemory.empty())
+            return refuse(fileName, errno, status);
+    }
+    if (isPipe) {
+        if (const int error = readPipe(file.number(), opened->mMemory, size); error != 0)
+            return refuse(fileName, error, status);
+    } else {
+        opened->mFile = file.release();
+        opened->mModified = facts.st_mtim;
+    }
+    if (size == 0) {
+        status.SetCode(FbxStatus::eInvalidFile, "%s: the %s is empty", fileName.c_str(), isPipe ? "pipe" : "file");
+        return nullptr;
+    }
+    opened->mSize = size;
+    return opened;
+}
+
+bool FileBytes::contains(std::span<const char> part) const {
+    const std::less_equal<const char*> inOrder; // also for pointers that do not belong together
+    const std::span<const char> all = bytes();
+    return inOrder(all.data(), part.data()) && inOrder(part.data() + part.size(), all.data() + all.size());
+}
+
+void FileBytes::copy(std::span<const char> part, char* destination) const {
+    const auto offset = static_cast<std::uint64_t>(part.data() - mMemory.data());
+    const int error = systemFileOperations().readAt(mFile, offset, {destination, part.size()});
+    if (error == 0)
+        return;
+    requireUnchanged();
+    throw FileFault(mName + ": offset " + std::to_string(offset) +
+                    ": cannot be read: " + std::generic_category().message(error));
+}
+
+void FileBytes::fetch(std::span<const char> part) const {
+    if (mFile >= 0)
+        copy(part, mMemory.data() + (part.data() - mMemory.data()));
+}
+
+void FileBytes::read(std::span<const char> part, char* destination) const {
+    if (mFile < 0) {
+        std::memcpy(destination, part.data(), part.size());
+        return;
+    }
+    copy(part, destination);
+    requireUnchanged();
+}
+
+void FileBytes::requireUnchanged() const {
+    struct stat facts = {};
+    if (mFile < 0 || ::fstat(mFile, &facts) != 0)
+        return;
+    if (static_cast<std::size_t>(facts.st_size) != mSize || isBefore(facts.st_mtim, mModified) ||
+        isBefore(mModified, facts.st_mtim))
+        throw FileFault(mName + ": the file was changed while it was read");
+}
+
+void ReadAhead::fetchUpTo(std::size_t offset, std::size_t end) {
+    constexpr std::size_t kSmallestStep = std::size_t{1} << 12, kLargestStep = std::size_t{1} << 18;
+    mStep = offset > mEnd ? kSmallestStep : std::clamp(2 * mStep, kSmallestStep, kLargestStep);
+    const std::size_t start = std::max(offset, mEnd);
+    mEnd = std::min(std::max(end, start + mStep), mBytes.size());
+    mFile->fetch(mBytes.subspan(start, mEnd - start));
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END
