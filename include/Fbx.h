@@ -24,7 +24,9 @@ class TnFbxWriteInfo;
 
 /// The facade. It has no state: any number of threads may call any number of facades.
 ///
-/// Where a bool is returned, false is a failure, and `lastError()` says why.
+/// Where a bool is returned, false is a failure, and `lastError()` says why. Where there is not enough memory, either
+/// that happens or std::bad_alloc is thrown, and nothing else ever is. A file that is changed while it is read is a
+/// failure, too, unless what was read until then is all that was asked for.
 class TARNELL_FBX_API Fbx {
 public:
     Fbx();
@@ -53,7 +55,7 @@ public:
     // The readers: every object of a kind in the file, or the one named by `info.getObjectName()`.
     //
     // `*objects` receives an array of `count` objects, parents before their children; null when `count` is 0, which is
-    // a success. The caller owns it and releases it with `delete[]`, also after a failure.
+    // a success. The caller owns it and releases it with `delete[]`, also after a failure and after std::bad_alloc.
     // With `kFbxFidelityFaithful` in `info` the values are those of docs/faithful.md, and what is said below of
     // producer cameras, surfaces and the first stack does not hold. False when `objects` is null (`count` is untouched
     // then), when `info` names no animation stack or no file, and when the file cannot be read. The first stack of the

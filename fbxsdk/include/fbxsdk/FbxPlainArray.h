@@ -39,7 +39,7 @@ public:
     [[nodiscard]] const char* at(int pIndex, std::size_t pItemBytes) {
         if (static_cast<unsigned>(pIndex - mWindowStart) >= static_cast<unsigned>(mWindowSize))
             moveWindow(pIndex);
-        return mBytes + static_cast<std::size_t>(pIndex) * pItemBytes;
+        return mWindow + static_cast<std::size_t>(pIndex - mWindowStart) * pItemBytes;
     }
 
 private:
@@ -47,7 +47,7 @@ private:
     void releaseUpTo(int pEnd);
 
     std::unique_ptr<StoredBytes> mSource;
-    const char* mBytes;
+    const char* mWindow = nullptr; ///< the first item of the window
     std::size_t mItemBytes;
     int mCount;
     int mWindowStart = 0;
@@ -73,7 +73,8 @@ protected:
     /// Makes that many items of what a file holds. There must be no items yet.
     void store(std::unique_ptr<StoredItems> pItems, int pCount);
     /// The count remains, and memory for as many items has to be written to.
-    [[nodiscard]] std::unique_ptr<StoredItems> takeStored(std::size_t pItemSize) const;
+    [[nodiscard]] void* roomForStored(std::size_t pItemSize) const;
+    void leaveFile() const;
     void forgetStored();
 
     /// Room for that many items. Throws std::bad_alloc when there is none; the items are untouched then.
@@ -164,10 +165,10 @@ private:
             readStored();
     }
     void readStored() const {
-        const std::unique_ptr<StoredItems> stored = takeStored(kItemBytes);
-        T* const to = static_cast<T*>(items());
+        T* const to = static_cast<T*>(roomForStored(kItemBytes));
         for (int i = 0; i < count(); ++i)
-            to[i] = storedItem(*stored, i);
+            to[i] = storedItem(stored(), i);
+        leaveFile(); // not before all of them are read: a file may have been changed
     }
 };
 

@@ -19,6 +19,7 @@
 #include <unistd.h>
 
 #include "container/FileOperations.h"
+#include "container/PageMemory.h"
 #include "container/ReadLimits.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -168,8 +169,11 @@ void FileBytes::copy(std::span<const char> part, char* destination) const {
 }
 
 void FileBytes::fetch(std::span<const char> part) const {
-    if (mFile >= 0)
-        copy(part, mMemory.data() + (part.data() - mMemory.data()));
+    if (mFile < 0)
+        return;
+    const std::span<char> place = mMemory.subspan(static_cast<std::size_t>(part.data() - mMemory.data()), part.size());
+    preferLargePages(place);
+    copy(part, place.data());
 }
 
 void FileBytes::read(std::span<const char> part, char* destination) const {
@@ -191,7 +195,7 @@ void FileBytes::requireUnchanged() const {
 }
 
 void ReadAhead::fetchUpTo(std::size_t offset, std::size_t end) {
-    constexpr std::size_t kSmallestStep = std::size_t{1} << 12, kLargestStep = std::size_t{1} << 18;
+    constexpr std::size_t kSmallestStep = std::size_t{1} << 10, kLargestStep = std::size_t{1} << 18;
     mStep = offset > mEnd ? kSmallestStep : std::clamp(2 * mStep, kSmallestStep, kLargestStep);
     const std::size_t start = std::max(offset, mEnd);
     mEnd = std::min(std::max(end, start + mStep), mBytes.size());

@@ -14,6 +14,7 @@
 #include "container/FileBytes.h"
 #include "container/NumberConversion.h"
 #include "container/NumberText.h"
+#include "container/PageMemory.h"
 #include "container/ZlibStream.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -196,6 +197,7 @@ std::span<const char> payloadOf(const StoredArray& array, std::unique_ptr<char[]
         return array.bytes;
     }
     memory = std::make_unique_for_overwrite<char[]>(array.bytes.size());
+    preferLargePages({memory.get(), array.bytes.size()});
     array.file->read(array.bytes, memory.get());
     return {memory.get(), array.bytes.size()};
 }

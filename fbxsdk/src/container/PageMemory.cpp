@@ -25,6 +25,16 @@ void releasePages(std::span<const char> bytes) {
     }
 }
 
+void preferLargePages(std::span<char> bytes) {
+    constexpr std::uintptr_t kLargePage = std::uintptr_t{1} << 21;
+    const auto address = reinterpret_cast<std::uintptr_t>(bytes.data());
+    const std::uintptr_t first = (address + kLargePage - 1) / kLargePage * kLargePage;
+    const std::uintptr_t end = (address + bytes.size()) / kLargePage * kLargePage;
+    if (first < end) {
+        ::madvise(bytes.data() + (first - address), end - first, MADV_HUGEPAGE);
+    }
+}
+
 PageMemory::PageMemory(std::size_t size) {
     void* const memory =
         ::mmap(nullptr, std::max<std::size_t>(size, 1), PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);

@@ -15,6 +15,10 @@ namespace detail {
 /// mapped there, or as zeros where there is none.
 void releasePages(std::span<const char> bytes);
 
+/// Memory that will soon be filled as a whole takes large pages, where the system has some: most of the time of small
+/// ones goes into getting them one by one.
+void preferLargePages(std::span<char> bytes);
+
 /// Zeroed memory of its own pages.
 class PageMemory {
 public:

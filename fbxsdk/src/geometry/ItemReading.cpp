@@ -58,8 +58,10 @@ bool holdsItems(const StoredArray& array) {
 
 /// Null when the array is corrupt.
 std::unique_ptr<StoredBytes> storedBytes(const std::shared_ptr<const FileBytes>& file, const StoredArray& array) {
-    auto loaded = std::make_unique<LoadedBytes>(file, array);
-    return loaded->isSound() ? std::move(loaded) : nullptr;
+    if (!array.compressed)
+        return std::make_unique<FileWindow>(file, array);
+    auto inflated = std::make_unique<InflatedBytes>(file, array);
+    return inflated->isSound() ? std::move(inflated) : nullptr;
 }
 
 } // namespace

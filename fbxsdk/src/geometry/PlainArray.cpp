@@ -37,7 +37,7 @@ int grownCapacity(int capacity, int needed) {
 } // namespace
 
 StoredItems::StoredItems(std::unique_ptr<StoredBytes> pSource, int pCount, std::size_t pItemBytes)
-    : mSource(std::move(pSource)), mBytes(mSource->bytes().data()), mItemBytes(pItemBytes), mCount(pCount) {}
+    : mSource(std::move(pSource)), mItemBytes(pItemBytes), mCount(pCount) {}
 
 StoredItems::~StoredItems() { releaseUpTo(mCount); }
 
@@ -46,7 +46,7 @@ void StoredItems::releaseUpTo(int pEnd) {
     constexpr std::size_t kLargestPage = std::size_t{1} << 16;
     const std::size_t start = static_cast<std::size_t>(mWindowStart) * mItemBytes;
     const std::size_t from = start - std::min(start, kLargestPage);
-    mSource->release({mBytes + from, static_cast<std::size_t>(pEnd) * mItemBytes - from});
+    mSource->release(mSource->bytes().subspan(from, static_cast<std::size_t>(pEnd) * mItemBytes - from));
 }
 
 // An index a little behind the window moves it along, so that half of it lies on either side of the index. The first
@@ -65,8 +65,12 @@ void StoredItems::moveWindow(int pIndex) {
     }
     const int last = mCount - 1;
     const bool ordered = start > 0 || pIndex < size;
+    const int count = !ordered || pIndex == last ? mCount - start : std::min(size, last - start);
+    mWindowSize = 0; // should the source fail
+    mWindow = mSource->look(mSource->bytes().subspan(static_cast<std::size_t>(start) * mItemBytes,
+                                                     static_cast<std::size_t>(count) * mItemBytes));
     mWindowStart = start;
-    mWindowSize = !ordered || pIndex == last ? mCount - start : std::min(size, last - start);
+    mWindowSize = count;
 }
 
 PlainStorage::PlainStorage() = default;
@@ -77,10 +81,12 @@ void PlainStorage::store(std::unique_ptr<StoredItems> pItems, int pCount) {
     mCount = pCount;
 }
 
-std::unique_ptr<StoredItems> PlainStorage::takeStored(std::size_t pItemSize) const {
+void* PlainStorage::roomForStored(std::size_t pItemSize) const {
     allocate(mCount, pItemSize); // where there is no memory, the items are still in the file
-    return std::move(mStored);
+    return mItems;
 }
+
+void PlainStorage::leaveFile() const { mStored.reset(); }
 
 void PlainStorage::forgetStored() {
     if (mStored) {

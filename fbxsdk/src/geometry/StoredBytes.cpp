@@ -5,6 +5,8 @@
 #include "geometry/StoredBytes.h"
 
 #include <algorithm>
+#include <cstring>
+#include <functional>
 
 #include "container/NumberDecoding.h"
 #include "container/ZlibStream.h"
@@ -12,35 +14,58 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-LoadedBytes::LoadedBytes(std::shared_ptr<const FileBytes> file, const StoredArray& array)
-    : mFile(std::move(file)), mArray(array),
-      mMemory(static_cast<std::size_t>(array.count) * elementSize(array.element)) {
-    load();
+namespace {
+
+/// Of a place in the bytes; their size for any other.
+std::size_t distanceInto(std::span<const char> bytes, const char* place) {
+    const std::less<const char*> before; // also for pointers that do not belong together
+    const bool within = !before(place, bytes.data()) && before(place, bytes.data() + bytes.size());
+    return within ? static_cast<std::size_t>(place - bytes.data()) : bytes.size();
 }
 
-void LoadedBytes::load() {
-    if (mArray.compressed) {
-        std::unique_ptr<char[]> memory;
-        mSound = inflateExactly(payloadOf(mArray, memory), mMemory.bytes());
-    } else {
-        mFile->read(mArray.bytes, mMemory.bytes().data());
-        mSound = true;
+} // namespace
+
+const char* FileWindow::look(std::span<const char> part) {
+    if (mSize < part.size()) {
+        mSize = 0;
+        mLast = {};
+        mMemory = std::make_unique_for_overwrite<char[]>(part.size());
+        mSize = part.size();
     }
+    // Windows overlap, since items are not quite asked for in order.
+    const std::size_t kept = mLast.size() - std::min(mLast.size(), distanceInto(mLast, part.data()));
+    const std::size_t size = std::min(kept, part.size());
+    std::memmove(mMemory.get(), mMemory.get() + (mLast.size() - kept), size);
+    mLast = {}; // should the file fail
+    mFile->read(part.subspan(size), mMemory.get() + size);
+    mLast = part;
+    return mMemory.get();
+}
+
+InflatedBytes::InflatedBytes(std::shared_ptr<const FileBytes> file, const StoredArray& array)
+    : mFile(std::move(file)), mArray(array),
+      mMemory(static_cast<std::size_t>(array.count) * elementSize(array.element)) {
+    inflate();
+}
+
+void InflatedBytes::inflate() {
+    std::unique_ptr<char[]> memory;
+    mSound = inflateExactly(payloadOf(mArray, memory), mMemory.bytes());
     if (!mSound)
         std::fill(mMemory.bytes().begin(), mMemory.bytes().end(), '\0');
 }
 
-void LoadedBytes::release(std::span<const char> part) {
+void InflatedBytes::release(std::span<const char> part) {
     if (mStays || part.empty())
         return;
     releasePages(part);
     mIncomplete = true;
 }
 
-void LoadedBytes::restore() {
+void InflatedBytes::restore() {
     if (!mIncomplete)
         return;
-    load();
+    inflate();
     mIncomplete = false;
     mStays = true;
 }

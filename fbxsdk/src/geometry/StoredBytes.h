@@ -20,19 +20,41 @@ public:
     StoredBytes& operator=(const StoredBytes&) = delete;
     virtual ~StoredBytes() = default;
 
+    /// The places of all bytes. Whoever reads some asks for a look at them.
     [[nodiscard]] virtual std::span<const char> bytes() const = 0;
+    /// Some of the bytes, until the next look. Throws FileFault.
+    [[nodiscard]] virtual const char* look(std::span<const char> part) { return part.data(); }
     /// These of the bytes need not be in memory. Before any of them is read again, restore must have been called.
     virtual void release(std::span<const char> part) = 0;
     /// All bytes are there again.
     virtual void restore() = 0;
 };
 
-/// An array of a file. It is read, and inflated if need be, when it is made, and a second time when it is restored;
-/// then it stays, so that nobody pays more than twice for reading again and again.
-class LoadedBytes final : public StoredBytes {
+/// An array that the file has just so. Each look reads it.
+class FileWindow final : public StoredBytes {
+public:
+    FileWindow(std::shared_ptr<const FileBytes> file, const StoredArray& array)
+        : mFile(std::move(file)), mPlaces(array.bytes) {}
+
+    [[nodiscard]] std::span<const char> bytes() const override { return mPlaces; }
+    [[nodiscard]] const char* look(std::span<const char> part) override;
+    void release(std::span<const char>) override {}
+    void restore() override {}
+
+private:
+    std::shared_ptr<const FileBytes> mFile;
+    std::span<const char> mPlaces;
+    std::unique_ptr<char[]> mMemory;
+    std::size_t mSize = 0;
+    std::span<const char> mLast; ///< of the last look
+};
+
+/// A compressed array. It is inflated when it is made, and a second time when it is restored; then it stays, so that
+/// nobody pays more than twice for reading again and again.
+class InflatedBytes final : public StoredBytes {
 public:
     /// Throws std::bad_alloc when there is no memory, and FileFault when the file was changed.
-    LoadedBytes(std::shared_ptr<const FileBytes> file, const StoredArray& array);
+    InflatedBytes(std::shared_ptr<const FileBytes> file, const StoredArray& array);
 
     /// False when the array is corrupt. All bytes are zero then.
     [[nodiscard]] bool isSound() const { return mSound; }
@@ -43,7 +65,7 @@ public:
     void restore() override;
 
 private:
-    void load();
+    void inflate();
 
     std::shared_ptr<const FileBytes> mFile;
     StoredArray mArray;

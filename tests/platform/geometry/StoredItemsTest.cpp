@@ -241,16 +241,16 @@ TEST(StoredItems, TakeThePlaceOfWhatWasThere) {
     EXPECT_EQ(array.value(1), 1);
 }
 
-class LoadedBytesTest : public testing::Test {
+class InflatedBytesTest : public testing::Test {
 protected:
     static constexpr std::size_t kSize = std::size_t{1} << 20;
 
-    LoadedBytesTest() : mContent(kSize, '\0') {
+    InflatedBytesTest() : mContent(kSize, '\0') {
         for (std::size_t i = 0; i < kSize; ++i) {
             mContent[i] = static_cast<char>(i % 251);
         }
     }
-    LoadedBytes inflated(const std::string& stream) {
+    InflatedBytes inflated(const std::string& stream) {
         FbxStatus status;
         const auto file = FileBytes::open(mFolder.write("file", stream), status);
         StoredArray array;
@@ -259,7 +259,7 @@ protected:
         array.count = kSize;
         array.bytes = file->bytes();
         array.file = file.get();
-        return LoadedBytes(file, array);
+        return InflatedBytes(file, array);
     }
     static std::string contentOf(const StoredBytes& bytes) { return {bytes.bytes().begin(), bytes.bytes().end()}; }
 
@@ -267,8 +267,8 @@ protected:
     std::string mContent;
 };
 
-TEST_F(LoadedBytesTest, AreInflatedAgainWhenTheyWereReleased) {
-    LoadedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
+TEST_F(InflatedBytesTest, AreInflatedAgainWhenTheyWereReleased) {
+    InflatedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
     EXPECT_TRUE(bytes.isSound());
     EXPECT_EQ(contentOf(bytes), mContent);
 
@@ -279,8 +279,8 @@ TEST_F(LoadedBytesTest, AreInflatedAgainWhenTheyWereReleased) {
     EXPECT_EQ(contentOf(bytes), mContent);
 }
 
-TEST_F(LoadedBytesTest, StayOnceTheyWereInflatedTwice) {
-    LoadedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
+TEST_F(InflatedBytesTest, StayOnceTheyWereInflatedTwice) {
+    InflatedBytes bytes = inflated(BinaryRecordBuilder::deflated(mContent));
     bytes.release(bytes.bytes());
     bytes.restore();
 
@@ -289,11 +289,11 @@ TEST_F(LoadedBytesTest, StayOnceTheyWereInflatedTwice) {
     EXPECT_EQ(contentOf(bytes), mContent);
 }
 
-TEST_F(LoadedBytesTest, OfACorruptStreamAreZero) {
+TEST_F(InflatedBytesTest, OfACorruptStreamAreZero) {
     std::string stream = BinaryRecordBuilder::deflated(mContent);
     stream[stream.size() / 2] = static_cast<char>(stream[stream.size() / 2] ^ 0x55);
 
-    const LoadedBytes bytes = inflated(stream);
+    const InflatedBytes bytes = inflated(stream);
 
     EXPECT_FALSE(bytes.isSound());
     EXPECT_EQ(contentOf(bytes), std::string(kSize, '\0'));

@@ -1,0 +1,176 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Reading and writing while one allocation, or all from one on, fail. The result is std::bad_alloc, or false with a
+// reason, or all that the call gives otherwise; never less with success, and never the end of the process.
+#include "FailingMalloc.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <functional>
+#include <memory>
+#include <new>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "Fbx.h"
+#include "TnFbxCamera.h"
+#include "TnFbxError.h"
+#include "TnFbxLight.h"
+#include "TnFbxMarker.h"
+#include "TnFbxMesh.h"
+#include "TnFbxNull.h"
+#include "TnFbxReadInfo.h"
+#include "TnFbxTransform.h"
+#include "support/TemporaryFolder.h"
+#include "support/WritingBuilders.h"
+
+namespace Tarnell::Fbx {
+namespace {
+
+/// What a call gave, in so far as it can be compared; nothing when it ran out of memory or failed.
+using Answer = std::optional<std::vector<double>>;
+
+class Numbers {
+public:
+    void add(double number) { mNumbers.push_back(number); }
+    void addChannels(const TnFbxTransform& object) {
+        add(static_cast<double>(object.getName().size()));
+        for (int i = 0; i <= TnFbxTransform::kFbxTransformPivotZ; ++i) {
+            const auto channel = static_cast<TnFbxTransform::EFbxTransformChannelType>(i);
+            add(static_cast<double>(object.getTransformValue(channel)));
+            add(object.getTransformAnimated(channel) ? 1.0 : 0.0);
+        }
+    }
+    void addMesh(const TnFbxMesh& mesh) {
+        add(mesh.getNumberOfPolygons());
+        for (int i = 0; i < mesh.getNumberOfControlPoints(); ++i) {
+            float x = 0.0f, y = 0.0f, z = 0.0f;
+            mesh.getControlPoint(i, x, y, z);
+            add(static_cast<double>(x) + 2.0 * static_cast<double>(y) + 4.0 * static_cast<double>(z));
+        }
+        for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
+            float u = 0.0f, v = 0.0f, x = 0.0f, y = 0.0f, z = 0.0f;
+            mesh.getUV(i, u, v);
+            mesh.getNormal(i, x, y, z);
+            add(mesh.getPointIndex(i));
+            add(static_cast<double>(u) + 2.0 * static_cast<double>(v) + static_cast<double>(x + y + z));
+        }
+    }
+    std::vector<double> take() { return std::move(mNumbers); }
+
+private:
+    std::vector<double> mNumbers;
+};
+
+void failUnlessTold(bool result) {
+    if (!result && lastError().empty()) {
+        ADD_FAILURE() << "a failure without a reason";
+    }
+}
+
+/// Objects of one kind, read while memory may give out, and looked at when it does not any more.
+template <class Object>
+Answer read(bool (Fbx::*reader)(TnFbxReadInfo&, Object**, int&) const, TnFbxReadInfo& info) {
+    Object* objects = nullptr;
+    int count = 0;
+    bool result = false;
+    bool hadMemory = true;
+    try {
+        result = (Fbx().*reader)(info, &objects, count);
+    } catch (const std::bad_alloc&) {
+        hadMemory = false;
+    }
+    faults::failNoAllocation();
+    const std::unique_ptr<Object[]> owner(objects);
+    EXPECT_TRUE(objects == nullptr || count > 0);
+    if (hadMemory) {
+        failUnlessTold(result);
+    }
+    Numbers numbers;
+    for (int i = 0; objects != nullptr && i < count; ++i) { // whatever the result, they can be looked at
+        numbers.addChannels(objects[i]);
+        if constexpr (std::is_same_v<Object, TnFbxMesh>) {
+            numbers.addMesh(objects[i]);
+        }
+    }
+    return result && lastWarnings().empty() ? Answer(numbers.take()) : std::nullopt;
+}
+
+/// Runs the work once as it is, and then with failing allocations.
+void tryPositions(const std::function<Answer()>& work) {
+    static_cast<void>(work()); // what is made once and stays is there now
+    static_cast<void>(faults::countAllocations());
+    const Answer expected = work();
+    const long all = faults::countAllocations();
+    for (long position = 0; position < all; ++position) {
+        for (const bool andAllBehind : {false, true}) {
+            faults::failAllocation(position, andAllBehind);
+            const Answer answer = work();
+            faults::failNoAllocation();
+            if (answer && expected) {
+                EXPECT_TRUE(*answer == *expected)
+                    << "less, with success, when allocation " << position << " of " << all << " fails";
+            }
+        }
+    }
+}
+
+class ReadingWithoutMemory : public testing::TestWithParam<const char*> {};
+
+TEST_P(ReadingWithoutMemory, GivesAllOrFails) {
+    TnFbxReadInfo info;
+    info.setFileName(std::string(TARNELL_TEST_DATA) + "/" + GetParam());
+    info.setAnimationStackName("Take 001");
+    tryPositions([&] { return read(&Fbx::getMeshes, info); });
+    tryPositions([&] { return read(&Fbx::getCameras, info); });
+    tryPositions([&] { return read(&Fbx::getTransforms, info); });
+}
+
+INSTANTIATE_TEST_SUITE_P(Files, ReadingWithoutMemory,
+                         testing::Values("blender/layers_7400_binary.fbx", "blender/skin_7400_binary.fbx",
+                                         "container/handmade_values_3000_binary.fbx", "sdk/camera_5800_ascii.fbx",
+                                         "sdk/skin_5800_ascii.fbx", "sdk/blend_shape_6100_ascii.fbx",
+                                         "sdk/layers_7400_ascii.fbx", "sdk/nurbs_7400_ascii.fbx",
+                                         "sdk/caches_7400_ascii.fbx", "sdk/rig_7400_ascii.fbx",
+                                         "tool/moving_triangle.fbx"));
+
+class WritingWithoutMemory : public testing::TestWithParam<int> {};
+
+TEST_P(WritingWithoutMemory, WritesAllOrFails) {
+    const support::TemporaryFolder folder;
+    const auto mesh = test::polygonMesh("box", 5);
+    TnFbxCamera camera;
+    camera.setName("camera");
+    TnFbxWriteInfo info;
+    info.setFileName(folder.file("shot.fbx"));
+    info.setAnimationStackName("Take 001");
+    info.setFileFormat(GetParam() % 2 == 0);
+    info.setAnimateMeshVertices(false);
+    info.setCompatibilityVersion(static_cast<TnFbxWriteInfo::eCompatibilityVersion>(GetParam()));
+    setenv("SOURCE_DATE_EPOCH", "1000000000", 1); // equal scenes give equal files
+    const auto content = [&] { return static_cast<double>(std::hash<std::string>()(folder.read("shot.fbx"))); };
+    tryPositions([&]() -> Answer {
+        bool result = false;
+        bool hadMemory = true;
+        try {
+            result = Fbx().writeFile(info, {&camera}, {}, {}, {}, {mesh.get()});
+        } catch (const std::bad_alloc&) {
+            hadMemory = false;
+        }
+        faults::failNoAllocation();
+        if (hadMemory) {
+            failUnlessTold(result);
+        }
+        EXPECT_EQ(testing::PrintToString(folder.files()), R"({ "shot.fbx" })");
+        return result && lastWarnings().empty() ? Answer(std::vector<double>{content()}) : std::nullopt;
+    });
+}
+
+INSTANTIATE_TEST_SUITE_P(Versions, WritingWithoutMemory, testing::Range(0, 6));
+
+} // namespace
+} // namespace Tarnell::Fbx
