@@ -3,6 +3,7 @@
 //
 // The outcome of the last call, one per thread.
 #include "LastError.h"
+#include "Printable.h"
 
 #include "TnFbxError.h"
 
@@ -30,14 +31,14 @@ const std::string& lastError() { return outcome().reason; }
 
 const std::vector<std::string>& lastWarnings() { return outcome().warnings; }
 
-bool detail::fail(std::string reason) {
-    outcome().reason = std::move(reason);
+bool detail::fail(const std::string& reason) {
+    outcome().reason = printable(reason);
     return false;
 }
 
 bool detail::failAbout(const std::string& fileName, const char* reason, const char* standIn) {
-    std::string text = reason != nullptr && *reason != '\0' ? reason : standIn;
-    return fail(text.compare(0, fileName.size(), fileName) == 0 ? std::move(text) : fileName + ": " + text);
+    const std::string text = reason != nullptr && *reason != '\0' ? reason : standIn;
+    return fail(text.compare(0, fileName.size(), fileName) == 0 ? text : fileName + ": " + text);
 }
 
 bool detail::succeed() {
@@ -45,7 +46,8 @@ bool detail::succeed() {
     return true;
 }
 
-void detail::warn(std::string sentence) {
+void detail::warn(const std::string& text) {
+    std::string sentence = printable(text);
     std::vector<std::string>& warnings = outcome().warnings;
     if (std::find(warnings.begin(), warnings.end(), sentence) == warnings.end()) {
         warnings.push_back(std::move(sentence));

@@ -10,8 +10,9 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Notes why the operation fails. Always false, so that failing is one line: `return fail("no node");`.
-bool fail(std::string reason);
+/// Notes why the operation fails, with what a terminal would obey escaped. Always false, so that failing is one line:
+/// `return fail("no node");`.
+bool fail(const std::string& reason);
 
 /// The same, with the name of the file in front, unless the reason names it already. `standIn` is the reason when there
 /// is none.
@@ -37,7 +38,7 @@ bool failOnFault(const std::string& fileName, const Work& work) {
 bool succeed();
 
 /// Adds a sentence to the warnings of the call, unless it is among them already.
-void warn(std::string sentence);
+void warn(const std::string& text);
 
 /// One call of the host's: the warnings start anew with the outermost one of a thread.
 class CallScope {

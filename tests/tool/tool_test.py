@@ -2,18 +2,73 @@
 # Copyright (c) Tarnell FBX contributors
 #
 # The commands that look into files, as a user meets them: what they print, where, and with which exit status.
+import json
 import os
+import subprocess
 import sys
 import tempfile
 import unittest
 
-from support import NO_FRAMES, SHOT, dump, edited, float32, named, run
+from support import NO_FRAMES, SHOT, TOOL, dump, edited, float32, named, run
 
 CAMERA_CHANNELS = [
     "lookAtPositionX", "lookAtPositionY", "lookAtPositionZ", "upPositionX", "upPositionY", "upPositionZ", "roll",
     "focalLength", "apertureWidth", "apertureHeight", "nearPlane", "farPlane", "filedOfView", "filedOfViewX",
     "filedOfViewY", "filmOffsetX", "filmOffsetY"]
 TRANSFORM_CHANNELS = [kind + axis for kind in ("position", "rotation", "scale", "skew", "pivot") for axis in "XYZ"]
+
+
+class StandardInput(unittest.TestCase):
+    def test_every_command_reads_it(self):
+        with open(SHOT, "rb") as file:
+            content = file.read()
+        page = json.loads(subprocess.run([TOOL, "dump", "-"], input=content, capture_output=True, check=True).stdout)
+        self.assertEqual(page.pop("file"), "standard input")
+        expected = dump(SHOT)
+        del expected["file"]
+        self.assertEqual(page, expected)
+        shown = subprocess.run([TOOL, "info", "-"], input=content, capture_output=True, check=True).stdout
+        self.assertTrue(shown.startswith(b"standard input\n"), shown[:40])
+        with tempfile.TemporaryDirectory() as folder:
+            out = os.path.join(folder, "out.fbx")
+            subprocess.run([TOOL, "convert", "--kind", "cameras", "-", out], input=content, check=True)
+            self.assertTrue(dump("--kind", "cameras", out)["cameras"])
+
+    def test_what_is_no_fbx_file_is_refused_by_its_name(self):
+        done = subprocess.run([TOOL, "dump", "-"], input=b"nothing", capture_output=True)
+        self.assertEqual(done.returncode, 1)
+        self.assertEqual(done.stderr, b"tarnell-fbx: standard input: neither a binary nor an ASCII FBX file\n")
+        done = subprocess.run([TOOL, "info", "-"], input=b"", capture_output=True)
+        self.assertEqual((done.returncode, done.stderr), (1, b"tarnell-fbx: standard input: the file is empty\n"))
+
+
+class ControlCharacters(unittest.TestCase):
+    def setUp(self):
+        self.folder = tempfile.TemporaryDirectory()
+        self.addCleanup(self.folder.cleanup)
+        self.file = os.path.join(self.folder.name, "names.fbx")
+        name = b"a\x1b[31m\x07b\x7fc\xc2\x9bd\xffe"
+        with open(self.file, "wb") as file:
+            file.write(b"; FBX 7.4.0 project file\nFBXHeaderExtension: {\n FBXVersion: 7400\n}\n"
+                       b"Objects: {\n Model: 1, \"Model::" + name + b"\", \"Null\" {\n }\n}\n"
+                       b"Connections: {\n C: \"OO\",1,0\n}\n")
+
+    def assert_harmless(self, text):
+        for byte in text:
+            self.assertTrue(byte >= 0x20 and byte != 0x7F or byte == 0x0A, text)
+        self.assertNotIn(b"\xc2\x9b", text)
+        text.decode("utf-8")
+
+    def test_of_names_are_escaped(self):
+        for command in (["info"], ["dump"]):
+            shown = subprocess.run([TOOL, *command, self.file], capture_output=True, check=True)
+            self.assert_harmless(shown.stdout)
+            self.assertIn(b"31m", shown.stdout)
+
+    def test_of_errors_are_escaped(self):
+        done = subprocess.run([TOOL, "info", os.path.join(self.folder.name, "\x1b[2J.fbx")], capture_output=True)
+        self.assertEqual(done.returncode, 1)
+        self.assert_harmless(done.stderr)
 
 
 class Dump(unittest.TestCase):

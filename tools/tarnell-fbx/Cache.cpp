@@ -360,7 +360,7 @@ int cache(const CacheOptions& options) {
             page.json("cache", [&](JsonWriter& json) { printJson(entries, options, json); });
         } else {
             std::ostream& out = page.begin();
-            out << page.terminal().paint(Ink::heading, terminalText(page.file())) << '\n';
+            out << page.terminal().paint(Ink::heading, spoken(page.file())) << '\n';
             for (const CacheEntry& entry : entries)
                 printEntry(entry, options, out, page.terminal());
             if (entries.empty())

@@ -98,6 +98,9 @@ int curve(const CurveOptions& options);
 int cache(const CacheOptions& options);
 int records(const RecordsOptions& options);
 
+/// The text as it is shown to people: without anything that a terminal would obey.
+std::string spoken(const std::string& text);
+
 /// One line on standard error, as every failure of the tool prints it.
 void printError(const std::string& file, const std::string& reason);
 

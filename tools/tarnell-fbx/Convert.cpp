@@ -389,7 +389,7 @@ int convert(const ConvertOptions& options) {
     return guarded(options.output, [&]() -> int {
         const bool written = conversion.write();
         for (const std::string& loss : conversion.losses())
-            std::cerr << "tarnell-fbx: " << options.input << ": " << loss << '\n';
+            printError(options.input, loss);
         for (const std::string& warning : lastWarnings())
             printError(options.output, warning);
         const bool lossless = conversion.losses().empty() && lastWarnings().empty();

@@ -254,7 +254,7 @@ void printSamples(const Curves& curves, const Terminal& terminal, std::ostream& 
 }
 
 void printTitle(const Curves& curves, Page& page, std::ostream& out) {
-    out << page.terminal().paint(Ink::heading, terminalText(page.file()))
+    out << page.terminal().paint(Ink::heading, spoken(page.file()))
         << (curves.take ? "  take " + inQuotes(curves.take->GetName()) : "  no take") << ", "
         << numberText(curves.file.frameRate()) << " frames per second, unit "
         << unitName(curves.file.scene().GetGlobalSettings().GetSystemUnit().GetScaleFactor()) << '\n'

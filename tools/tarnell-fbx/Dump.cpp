@@ -12,6 +12,7 @@
 #include "Commands.h"
 #include "FileFacts.h"
 #include "JsonWriter.h"
+#include "StandardInput.h"
 
 #include "Fbx.h"
 #include "FbxSdk.h"
@@ -209,7 +210,8 @@ public:
     bool print() {
         mJson.beginObject();
         mJson.key("file");
-        mJson.text(mOptions.file.substr(mOptions.file.find_last_of('/') + 1));
+        const std::string file = withoutKeptName(mOptions.file);
+        mJson.text(file.substr(file.find_last_of('/') + 1));
         if (mOptions.faithful)
             printFacts();
         printStacks();

@@ -7,15 +7,18 @@
 #include <new>
 
 #include "Commands.h"
+#include "StandardInput.h"
 #include "TerminalText.h"
 
 namespace tool {
 
+std::string spoken(const std::string& text) { return terminalText(withoutKeptName(text)); }
+
 void printError(const std::string& file, const std::string& reason) {
     // The library's sentences begin with the file already.
-    const bool named = reason.rfind(file + ": ", 0) == 0;
+    const std::string sentence = spoken(reason), start = spoken(file) + ": ";
     // In one piece: several files may fail at once.
-    std::cerr << "tarnell-fbx: " + terminalText(named ? reason : file + ": " + reason) + '\n';
+    std::cerr << "tarnell-fbx: " + (sentence.rfind(start, 0) == 0 ? "" : start) + sentence + '\n';
 }
 
 Outcome attempt(const std::function<int()>& work) {

@@ -9,12 +9,18 @@
 
 #include <glob.h>
 
+#include "StandardInput.h"
+
 namespace tool {
 
 FileList expandFiles(const std::vector<std::string>& names) {
     FileList list;
     for (const std::string& name : names) {
         std::error_code ignored;
+        if (name == "-") {
+            list.files.push_back(keepStandardInput());
+            continue;
+        }
         if (name.find_first_of("*?[") == std::string::npos || std::filesystem::exists(name, ignored)) {
             list.files.push_back(name);
             continue;

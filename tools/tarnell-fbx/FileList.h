@@ -15,7 +15,7 @@ struct FileList {
 };
 
 /// Patterns ("shots/*.fbx") are replaced by the files that they stand for, in the order of their names; a name that is
-/// a file, and one without *, ? and [, stays as it is.
+/// a file, and one without *, ? and [, stays as it is. "-" is standard input.
 FileList expandFiles(const std::vector<std::string>& names);
 
 } // namespace tool

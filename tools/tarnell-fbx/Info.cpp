@@ -190,7 +190,7 @@ void printTree(FbxNode& root, std::ostream& out, const Terminal& terminal) {
 void printText(const Facts& facts, FbxNode& root, Page& page) {
     std::ostream& out = page.begin();
     Lines lines(out, page.terminal());
-    out << page.terminal().paint(Ink::heading, terminalText(page.file())) << '\n';
+    out << page.terminal().paint(Ink::heading, spoken(page.file())) << '\n';
     lines.line("File version", versionText(facts.version) + (facts.ascii ? ", ASCII" : ", binary") +
                                    (facts.bytes ? ", " + sizeText(*facts.bytes) : ""));
     lines.line("Creator", facts.creator.empty() ? "not stated" : terminalText(facts.creator));

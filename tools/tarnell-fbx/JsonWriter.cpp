@@ -24,7 +24,23 @@ void JsonWriter::text(std::string_view value) {
         return;
     }
     // Names may hold anything; what is no UTF-8 becomes the replacement character.
-    raw(nlohmann::json(std::string(value)).dump(-1, ' ', false, nlohmann::json::error_handler_t::replace));
+    const std::string text =
+        nlohmann::json(std::string(value)).dump(-1, ' ', false, nlohmann::json::error_handler_t::replace);
+    // JSON allows the last control character of ASCII and those of the upper half, but terminals obey them.
+    std::string escaped;
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        const bool isControl = text[i] == '\xC2' && static_cast<unsigned char>(text[i + 1]) < 0xA0;
+        if (isControl) {
+            const auto code = static_cast<unsigned char>(text[++i]);
+            escaped += code < 0x90 ? "\\u008" : "\\u009";
+            escaped += "0123456789abcdef"[code & 0xFU];
+        } else if (text[i] == '\x7F') {
+            escaped += "\\u007f";
+        } else {
+            escaped += text[i];
+        }
+    }
+    raw(escaped);
 }
 
 void JsonWriter::reals(float value, std::size_t count) {

@@ -135,7 +135,7 @@ int props(const PropsOptions& options) {
             return kSuccess;
         }
         std::ostream& out = page.begin();
-        out << page.terminal().paint(Ink::heading, terminalText(page.file()))
+        out << page.terminal().paint(Ink::heading, spoken(page.file()))
             << (take ? "  take " + inQuotes(take->GetName()) : "  no take") << '\n';
         for (const FbxObject* object : objects) {
             out << '\n';

@@ -86,7 +86,7 @@ public:
     void printText(Page& page) {
         std::ostream& out = page.begin();
         mTerminal = &page.terminal();
-        out << mTerminal->paint(Ink::heading, terminalText(page.file())) << "  version " << mFile.version() << ", "
+        out << mTerminal->paint(Ink::heading, spoken(page.file())) << "  version " << mFile.version() << ", "
             << (mFile.isAscii() ? "ASCII, lines" : "binary, byte offsets")
             << (mFile.isBigEndian() ? ", big-endian" : "") << ", " << sizeText(mFile.size()) << '\n';
         mColumn = std::to_string(mFile.size()).size() + 2;

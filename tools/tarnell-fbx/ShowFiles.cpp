@@ -15,6 +15,7 @@
 
 #include "FileList.h"
 #include "Progress.h"
+#include "StandardInput.h"
 #include "TerminalText.h"
 
 namespace tool {
@@ -32,7 +33,7 @@ void Page::json(std::string_view command, const std::function<void(JsonWriter&)>
     json.key("format");
     json.text("tarnell-fbx " + std::string(command) + " 1");
     json.key("file");
-    json.text(mFile);
+    json.text(withoutKeptName(mFile));
     content(json);
     json.endObject();
     if (mForm == Form::jsonLines)

@@ -139,7 +139,7 @@ void printNode(const std::string& branch, FbxNode& node, int folded, std::ostrea
 void printText(const std::vector<TreeNode>& nodes, int depth, Page& page) {
     std::ostream& out = page.begin();
     const Terminal& terminal = page.terminal();
-    out << terminal.paint(Ink::heading, terminalText(page.file())) << '\n';
+    out << terminal.paint(Ink::heading, spoken(page.file())) << '\n';
     Branches branches;
     bool toldDetached = false;
     for (std::size_t i = 0; i < nodes.size(); ++i) {

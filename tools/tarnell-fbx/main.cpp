@@ -22,6 +22,7 @@
 #include "LookCommands.h"
 #include "Manual.h"
 #include "Similarity.h"
+#include "StandardInput.h"
 #include "StandardOutput.h"
 #include "TerminalText.h"
 
@@ -57,7 +58,7 @@ std::vector<std::string> parseKinds(const std::string& text, const std::vector<s
 
 void addDump(CLI::App& app, tool::DumpOptions& options) {
     CLI::App* dump = app.add_subcommand("dump", "Print what the library reads as one JSON document");
-    dump->add_option("FILE", options.file, "The FBX file")->required();
+    dump->add_option("FILE", options.file, "The FBX file; - for standard input")->required();
     dump->add_option_function<std::string>(
             "--kind", [&options](const std::string& text) { options.kinds = parseKinds(text, tool::dumpKinds()); },
             "Comma list of cameras, lights, markers, nulls, transforms, meshes (default: all six)")
@@ -85,7 +86,7 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
 
 void addConvert(CLI::App& app, tool::ConvertOptions& options) {
     CLI::App* convert = app.add_subcommand("convert", "Write what the library reads into another FBX file");
-    convert->add_option("IN", options.input, "The FBX file to read")->required();
+    convert->add_option("IN", options.input, "The FBX file to read; - for standard input")->required();
     convert->add_option("OUT", options.output, "The FBX file to write")->required();
     convert
         ->add_option_function<std::string>(
@@ -186,6 +187,12 @@ void addSources(CLI::App& app, std::function<int()>& chosen) {
         ->type_name("");
 }
 
+/// Where a file is called "-".
+void takeStandardInput(std::string& file) {
+    if (file == "-")
+        file = tool::keepStandardInput();
+}
+
 int run(int argc, char** argv) {
     CLI::App app("Looks into FBX files and writes them", "tarnell-fbx");
     app.require_subcommand(1);
@@ -216,6 +223,8 @@ int run(int argc, char** argv) {
     }
     if (chosen)
         return chosen();
+    for (std::string* file : {&dumpOptions.file, &convertOptions.input})
+        takeStandardInput(*file);
     if (app.got_subcommand("convert"))
         return tool::guarded(convertOptions.input, [&] { return tool::convert(convertOptions); });
     return tool::guarded(dumpOptions.file, [&] { return tool::dump(dumpOptions); });

@@ -29,9 +29,9 @@ using detail::FileBytes;
 std::shared_ptr<const FileBytes> wholeFile(const std::string& name, FbxStatus& status) {
     auto file = FileBytes::open(name, status);
     const bool read = file && detail::faultToStatus(status, [&file] {
-        file->fetch(file->bytes());
-        return true;
-    });
+                          file->fetch(file->bytes());
+                          return true;
+                      });
     return read ? file : nullptr;
 }
 
