@@ -20,7 +20,7 @@ constexpr int kSmallestCapacity = 8;
 /// How many items are kept at hand while they are read in order: an eighth, of long arrays less, but enough that asking
 /// the system costs nothing beside them.
 int windowSize(int count, std::size_t itemBytes) {
-    constexpr std::size_t kMostBytes = std::size_t{1} << 20;
+    constexpr std::size_t kMostBytes = std::size_t{1} << 18;
     return std::min(count / 8 + 2, static_cast<int>(kMostBytes / itemBytes));
 }
 
