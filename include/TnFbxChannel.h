@@ -64,7 +64,8 @@ public:
     bool setAnimatedValues(TnFbxTime time, const std::vector<float>& values);
     bool setAnimatedValues(TnFbxTime time, std::vector<float>&& values);
 
-    /// The same with one value for every frame of the range, at the cost of one sample.
+    /// The same with one value for every frame of the range. It takes the memory of one sample; what there was before
+    /// is released.
     bool setConstantValues(TnFbxTime time, float value);
 
     /// The value at a possibly fractional frame; the static value when there are no samples.
@@ -83,7 +84,6 @@ private:
     float sampleAt(std::size_t index) const { return mValues[mValues.size() > 1 ? index : 0]; }
     std::size_t indexOf(int frame) const;
     std::size_t countToCover(int frame) const;
-    void keepAsOne(const TnFbxTime& time, std::size_t count, float value);
     void takeOver(const TnFbxTime& time, std::size_t count);
     void spread();
     void coverFrame(int frame);

@@ -166,11 +166,11 @@ bool TnFbxChannel::setAnimatedValues(TnFbxTime time, const std::vector<float>& v
         return false;
     }
     if (areAllEqual(values)) {
-        keepAsOne(time, values.size(), values.front());
+        mValues.assign(1, values.front());
     } else {
         mValues = values;
-        takeOver(time, mValues.size());
     }
+    takeOver(time, values.size());
     return true;
 }
 
@@ -178,12 +178,9 @@ bool TnFbxChannel::setAnimatedValues(TnFbxTime time, std::vector<float>&& values
     if (!areSamples(time, values.size())) {
         return false;
     }
-    if (areAllEqual(values)) {
-        keepAsOne(time, values.size(), values.front());
-    } else {
-        mValues = std::move(values);
-        takeOver(time, mValues.size());
-    }
+    const std::size_t count = values.size();
+    mValues = areAllEqual(values) ? std::vector<float>(1, values.front()) : std::move(values);
+    takeOver(time, count);
     return true;
 }
 
@@ -191,13 +188,9 @@ bool TnFbxChannel::setConstantValues(TnFbxTime time, float value) {
     if (!isRange(time)) {
         return false;
     }
-    keepAsOne(time, framesOf(time), value);
+    mValues = std::vector<float>(1, value);
+    takeOver(time, framesOf(time));
     return true;
-}
-
-void TnFbxChannel::keepAsOne(const TnFbxTime& time, std::size_t count, float value) {
-    mValues.assign(1, value);
-    takeOver(time, count);
 }
 
 void TnFbxChannel::takeOver(const TnFbxTime& time, std::size_t count) {
