@@ -160,7 +160,8 @@ private:
         forEachChannel(object, [this](TnFbxChannel& channel) { resample(channel, *mOptions.fps); });
     }
 
-    static void forgetSamples(TnFbxChannel& channel) { channel.deleteChannel(); }
+    /// One sample instead of many, because a channel without samples keeps the memory of those it had.
+    static void forgetSamples(TnFbxChannel& channel) { channel.setConstantValues(TnFbxTime(), channel.getValue()); }
 
     /// A long range in which a value does not change need not have a key for every frame of it.
     static void makeStatic(TnFbxChannel& channel) {

@@ -7,6 +7,7 @@
 #include <array>
 #include <cmath>
 #include <memory>
+#include <utility>
 #include <vector>
 
 namespace tool {
@@ -23,12 +24,12 @@ void append(Curves& curves, const FbxVector4& value) {
         curves[static_cast<std::size_t>(axis)].push_back(static_cast<float>(value[axis]));
 }
 
-void store(TnFbxTransform& object, Channel first, const TnFbxTime& range, const Curves& curves) {
+void store(TnFbxTransform& object, Channel first, const TnFbxTime& range, Curves curves) {
     for (int axis = 0; axis < 3; ++axis) {
         const auto channel = static_cast<Channel>(first + axis);
-        const std::vector<float>& values = curves[static_cast<std::size_t>(axis)];
-        object.setTransformValueAt(channel, range, values);
+        std::vector<float>& values = curves[static_cast<std::size_t>(axis)];
         object.setTransformValue(channel, values.front());
+        object.setTransformValueAt(channel, range, std::move(values));
     }
 }
 
@@ -170,8 +171,8 @@ void placeCamera(TnFbxCamera& camera, FbxNode& node, const TnFbxTime& range) {
     }
     if (rotations[0].empty())
         return;
-    store(camera, Channel::kFbxTransformPositionX, range, positions);
-    store(camera, Channel::kFbxTransformRotationX, range, rotations);
+    store(camera, Channel::kFbxTransformPositionX, range, std::move(positions));
+    store(camera, Channel::kFbxTransformRotationX, range, std::move(rotations));
     camera.setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderXYZ);
 }
 
@@ -202,7 +203,7 @@ void expressInXyz(TnFbxTransform& object) {
         last = now;
         append(rotations, angles);
     }
-    store(object, Channel::kFbxTransformRotationX, range, rotations);
+    store(object, Channel::kFbxTransformRotationX, range, std::move(rotations));
     object.setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderXYZ);
 }
 
