@@ -318,215 +318,214 @@ TEST_P(GeometryWriting, KeepsASkin) {
     ASSERT_NE(backSkin, nullptr);
     EXPECT_EQ(backSkin->GetDeformAccuracy(), 75.0);
     if (GetParam().hasIds()) {
-        {
-            EXPECT_EQ(backSkin->GetSkinningType(), FbxSkin::eDualQuaternion);
-            ASSERT_EQ(backSkin->GetControlPointIndicesCount(), 1);
-            EXPECT_EQ(backSkin->GetControlPointBlendWeights()[0], 0.5);
-        }
-        ASSERT_EQ(backSkin->GetClusterCount(), 2);
-        FbxCluster* backCluster = backSkin->GetCluster(0);
-        EXPECT_EQ(backCluster->GetLink(), copy->GetRootNode()->GetChild(1));
-        EXPECT_EQ(backCluster->GetLinkMode(), FbxCluster::eTotalOne);
-        ASSERT_EQ(backCluster->GetControlPointIndicesCount(), 2);
-        EXPECT_EQ(backCluster->GetControlPointIndices()[1], 4);
-        EXPECT_EQ(backCluster->GetControlPointWeights()[1], 0.25);
-        FbxAMatrix backGeometry, backLink;
-        backCluster->GetTransformMatrix(backGeometry);
-        backCluster->GetTransformLinkMatrix(backLink);
-        for (int i = 0; i < 16; ++i) {
-            EXPECT_NEAR(backGeometry[i / 4][i % 4], geometry[i / 4][i % 4], 1e-12) << i;
-            EXPECT_EQ(backLink[i / 4][i % 4], link[i / 4][i % 4]) << i;
-        }
-        EXPECT_EQ(backSkin->GetCluster(1)->GetControlPointIndicesCount(), 0);
+        EXPECT_EQ(backSkin->GetSkinningType(), FbxSkin::eDualQuaternion);
+        ASSERT_EQ(backSkin->GetControlPointIndicesCount(), 1);
+        EXPECT_EQ(backSkin->GetControlPointBlendWeights()[0], 0.5);
     }
-
-    class ShapeWriting : public GeometryWriting {
-    protected:
-        FbxShape* addShape(FbxBlendShapeChannel* channel, const char* name, double fullPercent, double offset) {
-            FbxShape* shape = make<FbxShape>(name);
-            shape->InitControlPoints(5);
-            for (int i = 0; i < 5; ++i)
-                shape->SetControlPointAt(FbxVector4(i, 0.1 * i + (i == 3 ? offset : 0), -i), i);
-            channel->AddTargetShape(shape, fullPercent);
-            return shape;
-        }
-        FbxBlendShapeChannel* addChannel(FbxBlendShape* blendShape, const char* name, double percent) {
-            FbxBlendShapeChannel* channel = make<FbxBlendShapeChannel>(name);
-            channel->DeformPercent.Set(percent);
-            blendShape->AddBlendShapeChannel(channel);
-            return channel;
-        }
-    };
-
-    INSTANTIATE_TEST_SUITE_P(Versions, ShapeWriting, testing::ValuesIn(exporting::allLayouts()));
-
-    TEST_P(ShapeWriting, KeepsShapesTheirWeightsAndTheirKeys) {
-        FbxMesh* mesh = addMesh();
-        FbxBlendShape* blendShape = make<FbxBlendShape>("blend");
-        mesh->AddDeformer(blendShape);
-        FbxBlendShapeChannel* smile = addChannel(blendShape, "smile", 25);
-        FbxBlendShapeChannel* frown = addChannel(blendShape, "frown", 0);
-        addShape(smile, "smile", 100, 2);
-        addShape(frown, "frown", 100, -3);
-        FbxAnimLayer* layer = animate::addStack(*scene, "take");
-        animate::keys(frown->DeformPercent, layer, nullptr, {{0, 0}, {1, 80}});
-
-        FbxScene* copy = writeAndRead();
-
-        FbxMesh* back = attributeOf<FbxMesh>(copy);
-        ASSERT_NE(back, nullptr);
-        ASSERT_EQ(back->GetShapeCount(), 2);
-        auto* backBlend = FbxCast<FbxBlendShape>(back->GetDeformer(0, FbxDeformer::eBlendShape));
-        ASSERT_NE(backBlend, nullptr);
-        ASSERT_EQ(backBlend->GetBlendShapeChannelCount(), 2);
-        FbxBlendShapeChannel* backSmile = backBlend->GetBlendShapeChannel(0);
-        EXPECT_STREQ(backSmile->GetName(), "smile");
-        EXPECT_EQ(backSmile->DeformPercent.Get(), 25.0);
-        expectPoint(backSmile->GetTargetShape(0)->GetControlPointAt(3), 3, 0.1 * 3 + 2, -3);
-        expectPoint(backSmile->GetTargetShape(0)->GetControlPointAt(2), 2, 0.2, -2);
-        expectPoint(backBlend->GetBlendShapeChannel(1)->GetTargetShape(0)->GetControlPointAt(3), 3, 0.1 * 3 - 3, -3);
-        auto* backStack = copy->GetSrcObject<FbxAnimStack>(0);
-        ASSERT_NE(backStack, nullptr);
-        FbxAnimCurve* curve = back->GetShapeChannel(0, 1, backStack->GetMember<FbxAnimLayer>(0));
-        ASSERT_NE(curve, nullptr);
-        ASSERT_EQ(curve->KeyGetCount(), 2);
-        EXPECT_EQ(curve->KeyGetValue(1), 80.0F);
-        EXPECT_EQ(back->GetShapeChannel(0, 0, backStack->GetMember<FbxAnimLayer>(0)), nullptr);
+    ASSERT_EQ(backSkin->GetClusterCount(), 2);
+    FbxCluster* backCluster = backSkin->GetCluster(0);
+    EXPECT_EQ(backCluster->GetLink(), copy->GetRootNode()->GetChild(1));
+    EXPECT_EQ(backCluster->GetLinkMode(), FbxCluster::eTotalOne);
+    ASSERT_EQ(backCluster->GetControlPointIndicesCount(), 2);
+    EXPECT_EQ(backCluster->GetControlPointIndices()[1], 4);
+    EXPECT_EQ(backCluster->GetControlPointWeights()[1], 0.25);
+    FbxAMatrix backGeometry, backLink;
+    backCluster->GetTransformMatrix(backGeometry);
+    backCluster->GetTransformLinkMatrix(backLink);
+    for (int i = 0; i < 16; ++i) {
+        EXPECT_NEAR(backGeometry[i / 4][i % 4], geometry[i / 4][i % 4], 1e-12) << i;
+        EXPECT_EQ(backLink[i / 4][i % 4], link[i / 4][i % 4]) << i;
     }
+    EXPECT_EQ(backSkin->GetCluster(1)->GetControlPointIndicesCount(), 0);
+}
 
-    TEST_P(ShapeWriting, KeepsInBetweensWhereFilesHaveThem) {
-        FbxMesh* mesh = addMesh();
-        FbxBlendShape* blendShape = make<FbxBlendShape>("blend");
-        mesh->AddDeformer(blendShape);
-        FbxBlendShapeChannel* channel = addChannel(blendShape, "channel", 0);
-        addShape(channel, "half", 50, 1);
-        addShape(channel, "full", 100, 5);
-
-        FbxMesh* back = attributeOf<FbxMesh>(writeAndRead());
-
-        ASSERT_NE(back, nullptr);
-        auto* backBlend = FbxCast<FbxBlendShape>(back->GetDeformer(0, FbxDeformer::eBlendShape));
-        ASSERT_NE(backBlend, nullptr);
-        FbxBlendShapeChannel* backChannel = backBlend->GetBlendShapeChannel(0);
-        const bool inlined = GetParam().hasInlineShapes();
-        ASSERT_EQ(backChannel->GetTargetShapeCount(), inlined ? 1 : 2);
-        if (!inlined) {
-            EXPECT_EQ(backChannel->GetTargetShapeFullWeights()[0], 50.0);
-            EXPECT_EQ(backChannel->GetTargetShapeFullWeights()[1], 100.0);
-        }
-        expectPoint(backChannel->GetTargetShape(inlined ? 0 : 1)->GetControlPointAt(3), 3, 0.1 * 3 + 5, -3);
+class ShapeWriting : public GeometryWriting {
+protected:
+    FbxShape* addShape(FbxBlendShapeChannel* channel, const char* name, double fullPercent, double offset) {
+        FbxShape* shape = make<FbxShape>(name);
+        shape->InitControlPoints(5);
+        for (int i = 0; i < 5; ++i)
+            shape->SetControlPointAt(FbxVector4(i, 0.1 * i + (i == 3 ? offset : 0), -i), i);
+        channel->AddTargetShape(shape, fullPercent);
+        return shape;
     }
-
-    TEST_P(ShapeWriting, TellsShapesOfOneNameApart) {
-        FbxMesh* mesh = addMesh();
-        FbxBlendShape* blendShape = make<FbxBlendShape>("blend");
-        mesh->AddDeformer(blendShape);
-        for (int i = 0; i < 3; ++i)
-            addShape(addChannel(blendShape, "", 10.0 * i), i == 2 ? "Color" : "", 100, i + 1);
-
-        FbxMesh* back = attributeOf<FbxMesh>(writeAndRead());
-
-        ASSERT_NE(back, nullptr);
-        auto* backBlend = FbxCast<FbxBlendShape>(back->GetDeformer(0, FbxDeformer::eBlendShape));
-        ASSERT_NE(backBlend, nullptr);
-        ASSERT_EQ(backBlend->GetBlendShapeChannelCount(), 3);
-        for (int i = 0; i < 3; ++i) {
-            FbxBlendShapeChannel* channel = backBlend->GetBlendShapeChannel(i);
-            EXPECT_EQ(channel->DeformPercent.Get(), 10.0 * i);
-            expectPoint(channel->GetTargetShape(0)->GetControlPointAt(3), 3, 0.1 * 3 + i + 1, -3);
-        }
-        expectPoint(FbxVector4(back->Color.Get()[0], back->Color.Get()[1], back->Color.Get()[2]), 0.8, 0.8, 0.8);
+    FbxBlendShapeChannel* addChannel(FbxBlendShape* blendShape, const char* name, double percent) {
+        FbxBlendShapeChannel* channel = make<FbxBlendShapeChannel>(name);
+        channel->DeformPercent.Set(percent);
+        blendShape->AddBlendShapeChannel(channel);
+        return channel;
     }
+};
 
-    TEST_P(GeometryWriting, KeepsANurbsSurface) {
-        FbxNurbsSurface* surface = make<FbxNurbsSurface>("surface");
-        surface->SetOrder(4, 3);
-        surface->SetStep(5, 6);
-        surface->InitControlPoints(5, FbxNurbsSurfaceBase::eOpen, 4, FbxNurbsSurfaceBase::eOpen);
-        for (int i = 0; i < 20; ++i)
-            surface->SetControlPointAt(FbxVector4(i, i * i, -i, 1.0 + i), i);
-        for (int i = 0; i < surface->GetUKnotCount(); ++i)
-            surface->GetUKnotVector()[i] = i;
-        for (int i = 0; i < surface->GetVKnotCount(); ++i)
-            surface->GetVKnotVector()[i] = 2 * i;
-        surface->SetFlipNormals(true);
-        addNode("node", surface);
+INSTANTIATE_TEST_SUITE_P(Versions, ShapeWriting, testing::ValuesIn(exporting::allLayouts()));
 
-        FbxNurbsSurface* back = attributeOf<FbxNurbsSurface>(writeAndRead());
+TEST_P(ShapeWriting, KeepsShapesTheirWeightsAndTheirKeys) {
+    FbxMesh* mesh = addMesh();
+    FbxBlendShape* blendShape = make<FbxBlendShape>("blend");
+    mesh->AddDeformer(blendShape);
+    FbxBlendShapeChannel* smile = addChannel(blendShape, "smile", 25);
+    FbxBlendShapeChannel* frown = addChannel(blendShape, "frown", 0);
+    addShape(smile, "smile", 100, 2);
+    addShape(frown, "frown", 100, -3);
+    FbxAnimLayer* layer = animate::addStack(*scene, "take");
+    animate::keys(frown->DeformPercent, layer, nullptr, {{0, 0}, {1, 80}});
 
-        ASSERT_NE(back, nullptr);
-        EXPECT_EQ(back->GetUOrder(), 4);
-        EXPECT_EQ(back->GetVOrder(), 3);
-        EXPECT_EQ(back->GetUStep(), 5);
-        EXPECT_EQ(back->GetVStep(), 6);
-        ASSERT_EQ(back->GetControlPointsCount(), 20);
-        EXPECT_EQ(back->GetControlPointAt(7)[3], 8.0);
-        ASSERT_EQ(back->GetVKnotCount(), surface->GetVKnotCount());
-        EXPECT_EQ(back->GetVKnotVector()[3], 6.0);
-        EXPECT_TRUE(back->GetFlipNormals());
+    FbxScene* copy = writeAndRead();
+
+    FbxMesh* back = attributeOf<FbxMesh>(copy);
+    ASSERT_NE(back, nullptr);
+    ASSERT_EQ(back->GetShapeCount(), 2);
+    auto* backBlend = FbxCast<FbxBlendShape>(back->GetDeformer(0, FbxDeformer::eBlendShape));
+    ASSERT_NE(backBlend, nullptr);
+    ASSERT_EQ(backBlend->GetBlendShapeChannelCount(), 2);
+    FbxBlendShapeChannel* backSmile = backBlend->GetBlendShapeChannel(0);
+    EXPECT_STREQ(backSmile->GetName(), "smile");
+    EXPECT_EQ(backSmile->DeformPercent.Get(), 25.0);
+    expectPoint(backSmile->GetTargetShape(0)->GetControlPointAt(3), 3, 0.1 * 3 + 2, -3);
+    expectPoint(backSmile->GetTargetShape(0)->GetControlPointAt(2), 2, 0.2, -2);
+    expectPoint(backBlend->GetBlendShapeChannel(1)->GetTargetShape(0)->GetControlPointAt(3), 3, 0.1 * 3 - 3, -3);
+    auto* backStack = copy->GetSrcObject<FbxAnimStack>(0);
+    ASSERT_NE(backStack, nullptr);
+    FbxAnimCurve* curve = back->GetShapeChannel(0, 1, backStack->GetMember<FbxAnimLayer>(0));
+    ASSERT_NE(curve, nullptr);
+    ASSERT_EQ(curve->KeyGetCount(), 2);
+    EXPECT_EQ(curve->KeyGetValue(1), 80.0F);
+    EXPECT_EQ(back->GetShapeChannel(0, 0, backStack->GetMember<FbxAnimLayer>(0)), nullptr);
+}
+
+TEST_P(ShapeWriting, KeepsInBetweensWhereFilesHaveThem) {
+    FbxMesh* mesh = addMesh();
+    FbxBlendShape* blendShape = make<FbxBlendShape>("blend");
+    mesh->AddDeformer(blendShape);
+    FbxBlendShapeChannel* channel = addChannel(blendShape, "channel", 0);
+    addShape(channel, "half", 50, 1);
+    addShape(channel, "full", 100, 5);
+
+    FbxMesh* back = attributeOf<FbxMesh>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    auto* backBlend = FbxCast<FbxBlendShape>(back->GetDeformer(0, FbxDeformer::eBlendShape));
+    ASSERT_NE(backBlend, nullptr);
+    FbxBlendShapeChannel* backChannel = backBlend->GetBlendShapeChannel(0);
+    const bool inlined = GetParam().hasInlineShapes();
+    ASSERT_EQ(backChannel->GetTargetShapeCount(), inlined ? 1 : 2);
+    if (!inlined) {
+        EXPECT_EQ(backChannel->GetTargetShapeFullWeights()[0], 50.0);
+        EXPECT_EQ(backChannel->GetTargetShapeFullWeights()[1], 100.0);
     }
+    expectPoint(backChannel->GetTargetShape(inlined ? 0 : 1)->GetControlPointAt(3), 3, 0.1 * 3 + 5, -3);
+}
 
-    TEST_P(GeometryWriting, KeepsANurbsCurve) {
-        FbxNurbsCurve* curve = make<FbxNurbsCurve>("curve");
-        curve->SetOrder(3);
-        curve->InitControlPoints(4, FbxNurbsCurve::eOpen);
-        for (int i = 0; i < 4; ++i)
-            curve->SetControlPointAt(FbxVector4(i, 2 * i, 0, 0.5), i);
-        for (int i = 0; i < curve->GetKnotCount(); ++i)
-            curve->GetKnotVector()[i] = 0.25 * i;
-        addNode("node", curve);
+TEST_P(ShapeWriting, TellsShapesOfOneNameApart) {
+    FbxMesh* mesh = addMesh();
+    FbxBlendShape* blendShape = make<FbxBlendShape>("blend");
+    mesh->AddDeformer(blendShape);
+    for (int i = 0; i < 3; ++i)
+        addShape(addChannel(blendShape, "", 10.0 * i), i == 2 ? "Color" : "", 100, i + 1);
 
-        FbxNurbsCurve* back = attributeOf<FbxNurbsCurve>(writeAndRead());
+    FbxMesh* back = attributeOf<FbxMesh>(writeAndRead());
 
-        ASSERT_NE(back, nullptr);
-        EXPECT_EQ(back->GetOrder(), 3);
-        ASSERT_EQ(back->GetControlPointsCount(), 4);
-        EXPECT_EQ(back->GetControlPointAt(3)[1], 6.0);
-        EXPECT_EQ(back->GetControlPointAt(3)[3], 0.5);
-        ASSERT_EQ(back->GetKnotCount(), 7);
-        EXPECT_EQ(back->GetKnotVector()[6], 1.5);
+    ASSERT_NE(back, nullptr);
+    auto* backBlend = FbxCast<FbxBlendShape>(back->GetDeformer(0, FbxDeformer::eBlendShape));
+    ASSERT_NE(backBlend, nullptr);
+    ASSERT_EQ(backBlend->GetBlendShapeChannelCount(), 3);
+    for (int i = 0; i < 3; ++i) {
+        FbxBlendShapeChannel* channel = backBlend->GetBlendShapeChannel(i);
+        EXPECT_EQ(channel->DeformPercent.Get(), 10.0 * i);
+        expectPoint(channel->GetTargetShape(0)->GetControlPointAt(3), 3, 0.1 * 3 + i + 1, -3);
     }
+    expectPoint(FbxVector4(back->Color.Get()[0], back->Color.Get()[1], back->Color.Get()[2]), 0.8, 0.8, 0.8);
+}
 
-    TEST_P(GeometryWriting, KeepsAPatch) {
-        FbxPatch* patch = make<FbxPatch>("patch");
-        patch->InitControlPoints(4, FbxPatch::eBezier, 5, FbxPatch::eBSpline);
-        for (int i = 0; i < 20; ++i)
-            patch->SetControlPointAt(FbxVector4(i, 0, -i), i);
-        patch->SetStep(2, 3);
-        patch->SetClosed(false, true);
-        patch->SetUCapped(true, false);
-        addNode("node", patch);
+TEST_P(GeometryWriting, KeepsANurbsSurface) {
+    FbxNurbsSurface* surface = make<FbxNurbsSurface>("surface");
+    surface->SetOrder(4, 3);
+    surface->SetStep(5, 6);
+    surface->InitControlPoints(5, FbxNurbsSurfaceBase::eOpen, 4, FbxNurbsSurfaceBase::eOpen);
+    for (int i = 0; i < 20; ++i)
+        surface->SetControlPointAt(FbxVector4(i, i * i, -i, 1.0 + i), i);
+    for (int i = 0; i < surface->GetUKnotCount(); ++i)
+        surface->GetUKnotVector()[i] = i;
+    for (int i = 0; i < surface->GetVKnotCount(); ++i)
+        surface->GetVKnotVector()[i] = 2 * i;
+    surface->SetFlipNormals(true);
+    addNode("node", surface);
 
-        FbxPatch* back = attributeOf<FbxPatch>(writeAndRead());
+    FbxNurbsSurface* back = attributeOf<FbxNurbsSurface>(writeAndRead());
 
-        ASSERT_NE(back, nullptr);
-        EXPECT_EQ(back->GetUCount(), 4);
-        EXPECT_EQ(back->GetPatchVType(), FbxPatch::eBSpline);
-        EXPECT_EQ(back->GetVStep(), 3);
-        EXPECT_TRUE(back->GetVClosed());
-        EXPECT_TRUE(back->GetUCappedBottom());
-        EXPECT_FALSE(back->GetUCappedTop());
-        expectPoint(back->GetControlPointAt(19), 19, 0, -19);
-    }
+    ASSERT_NE(back, nullptr);
+    EXPECT_EQ(back->GetUOrder(), 4);
+    EXPECT_EQ(back->GetVOrder(), 3);
+    EXPECT_EQ(back->GetUStep(), 5);
+    EXPECT_EQ(back->GetVStep(), 6);
+    ASSERT_EQ(back->GetControlPointsCount(), 20);
+    EXPECT_EQ(back->GetControlPointAt(7)[3], 8.0);
+    ASSERT_EQ(back->GetVKnotCount(), surface->GetVKnotCount());
+    EXPECT_EQ(back->GetVKnotVector()[3], 6.0);
+    EXPECT_TRUE(back->GetFlipNormals());
+}
 
-    TEST_P(GeometryWriting, KeepsLines) {
-        FbxLine* line = make<FbxLine>("line");
-        line->InitControlPoints(3);
-        for (int i = 0; i < 3; ++i)
-            line->SetControlPointAt(FbxVector4(i, i, i), i);
-        line->SetIndexArraySize(4);
-        const int indices[] = {0, 1, 1, 2};
-        for (int i = 0; i < 4; ++i)
-            line->SetPointIndexAt(indices[i], i, /*pAsEndPoint=*/i % 2 == 1);
-        addNode("node", line);
+TEST_P(GeometryWriting, KeepsANurbsCurve) {
+    FbxNurbsCurve* curve = make<FbxNurbsCurve>("curve");
+    curve->SetOrder(3);
+    curve->InitControlPoints(4, FbxNurbsCurve::eOpen);
+    for (int i = 0; i < 4; ++i)
+        curve->SetControlPointAt(FbxVector4(i, 2 * i, 0, 0.5), i);
+    for (int i = 0; i < curve->GetKnotCount(); ++i)
+        curve->GetKnotVector()[i] = 0.25 * i;
+    addNode("node", curve);
 
-        FbxLine* back = attributeOf<FbxLine>(writeAndRead());
+    FbxNurbsCurve* back = attributeOf<FbxNurbsCurve>(writeAndRead());
 
-        ASSERT_NE(back, nullptr);
-        ASSERT_EQ(back->GetIndexArraySize(), 4);
-        EXPECT_EQ(back->GetPointIndexAt(3), 2);
-        EXPECT_EQ(back->GetEndPointCount(), 2);
-        EXPECT_EQ(back->GetEndPointAt(0), 1);
-    }
+    ASSERT_NE(back, nullptr);
+    EXPECT_EQ(back->GetOrder(), 3);
+    ASSERT_EQ(back->GetControlPointsCount(), 4);
+    EXPECT_EQ(back->GetControlPointAt(3)[1], 6.0);
+    EXPECT_EQ(back->GetControlPointAt(3)[3], 0.5);
+    ASSERT_EQ(back->GetKnotCount(), 7);
+    EXPECT_EQ(back->GetKnotVector()[6], 1.5);
+}
+
+TEST_P(GeometryWriting, KeepsAPatch) {
+    FbxPatch* patch = make<FbxPatch>("patch");
+    patch->InitControlPoints(4, FbxPatch::eBezier, 5, FbxPatch::eBSpline);
+    for (int i = 0; i < 20; ++i)
+        patch->SetControlPointAt(FbxVector4(i, 0, -i), i);
+    patch->SetStep(2, 3);
+    patch->SetClosed(false, true);
+    patch->SetUCapped(true, false);
+    addNode("node", patch);
+
+    FbxPatch* back = attributeOf<FbxPatch>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    EXPECT_EQ(back->GetUCount(), 4);
+    EXPECT_EQ(back->GetPatchVType(), FbxPatch::eBSpline);
+    EXPECT_EQ(back->GetVStep(), 3);
+    EXPECT_TRUE(back->GetVClosed());
+    EXPECT_TRUE(back->GetUCappedBottom());
+    EXPECT_FALSE(back->GetUCappedTop());
+    expectPoint(back->GetControlPointAt(19), 19, 0, -19);
+}
+
+TEST_P(GeometryWriting, KeepsLines) {
+    FbxLine* line = make<FbxLine>("line");
+    line->InitControlPoints(3);
+    for (int i = 0; i < 3; ++i)
+        line->SetControlPointAt(FbxVector4(i, i, i), i);
+    line->SetIndexArraySize(4);
+    const int indices[] = {0, 1, 1, 2};
+    for (int i = 0; i < 4; ++i)
+        line->SetPointIndexAt(indices[i], i, /*pAsEndPoint=*/i % 2 == 1);
+    addNode("node", line);
+
+    FbxLine* back = attributeOf<FbxLine>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    ASSERT_EQ(back->GetIndexArraySize(), 4);
+    EXPECT_EQ(back->GetPointIndexAt(3), 2);
+    EXPECT_EQ(back->GetEndPointCount(), 2);
+    EXPECT_EQ(back->GetEndPointAt(0), 1);
+}
 
 } // namespace
