@@ -15,8 +15,16 @@ using detail::PropertySampler;
 
 namespace {
 
-/// Whether every key of a curve has the same value and leads to the next in a straight line or not at all. Then it has
-/// that value everywhere, but for the sign of a zero.
+/// Whether the curve passes a key, whose neighbours have its value, without a slope: only users give one.
+bool isFlatAt(const fbxsdk::FbxAnimCurve& curve, int key) {
+    constexpr int kSlopesOfUsers =
+        fbxsdk::FbxAnimCurveDef::eTangentUser | fbxsdk::FbxAnimCurveDef::eTangentGenericBreak;
+    return curve.KeyGetInterpolation(key) != fbxsdk::FbxAnimCurveDef::eInterpolationCubic ||
+           (curve.KeyGetTangentMode(key) & kSlopesOfUsers) == 0;
+}
+
+/// Whether every key of a curve has the same value and no slope. Then it has that value everywhere, but for the sign of
+/// a zero.
 bool isLevel(const fbxsdk::FbxAnimCurve& curve) {
     const int keyCount = curve.KeyGetCount();
     if (keyCount < 2) {
@@ -26,9 +34,11 @@ bool isLevel(const fbxsdk::FbxAnimCurve& curve) {
     if (!std::isfinite(value) || (value == 0.0f && std::signbit(value))) {
         return false;
     }
+    const auto hasTheValue = [&curve, value](int key) {
+        return curve.KeyGetValue(key) == value && std::signbit(curve.KeyGetValue(key)) == std::signbit(value);
+    };
     for (int key = 0; key < keyCount; ++key) {
-        if (curve.KeyGetValue(key) != value || std::signbit(curve.KeyGetValue(key)) != std::signbit(value) ||
-            curve.KeyGetInterpolation(key) == fbxsdk::FbxAnimCurveDef::eInterpolationCubic) {
+        if (!hasTheValue(key) || !isFlatAt(curve, key)) {
             return false;
         }
     }

@@ -375,15 +375,19 @@ long allocationsOf(const Action& action) {
 }
 
 TEST_P(WriteFault, OfOptionsThatAreIncompleteComesBeforeAnythingIsMade) {
-    const long ofAManager = allocationsOf([] { fbxsdk::FbxManager::Create()->Destroy(); });
-    ASSERT_GT(ofAManager, 0);
+    const long ofAContext = allocationsOf([] {
+        FbxSdk sdk;
+        EXPECT_TRUE(sdk.initFbxSdkManager());
+    });
+    constexpr long kOfAReason = 8; // what its text takes
+    ASSERT_GT(ofAContext, kOfAReason);
     const TnFbxWriteInfo complete = info;
 
     info.setAnimationStackName("");
-    EXPECT_LT(allocationsOf([this] { EXPECT_FALSE(write()); }), ofAManager);
+    EXPECT_LE(allocationsOf([this] { EXPECT_FALSE(write()); }), kOfAReason);
     info = complete;
     info.setFileName("");
-    EXPECT_LT(allocationsOf([this] { EXPECT_FALSE(write()); }), ofAManager);
+    EXPECT_LE(allocationsOf([this] { EXPECT_FALSE(write()); }), kOfAReason);
 }
 
 TEST_P(WriteFault, OfAMediumThatIsFullAtAnySizeLeavesTheOldFile) {
