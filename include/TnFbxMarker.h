@@ -14,6 +14,10 @@
 
 namespace Tarnell::Fbx {
 
+namespace detail {
+struct MarkerChannels;
+}
+
 /// A marker. Its channels are reached only through the members below; no channel object is handed out.
 class TARNELL_FBX_API TnFbxMarker : public TnFbxTransform {
 public:
@@ -49,7 +53,7 @@ public:
     bool deleteMarker();
 
     /// The static value of a channel, and all its samples at once (`TnFbxChannel::setAnimatedValues`, with its result).
-    /// False when there is no such channel; nothing changes then. A single sample is set through `getMarkerChannel`.
+    /// False when there is no such channel; nothing changes then.
     bool setValue(EFbxMarkerChannelType channel, float value);
     bool setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, const std::vector<float>& values);
     bool setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, std::vector<float>&& values);
@@ -59,9 +63,6 @@ public:
     float getValueAt(EFbxMarkerChannelType channel, float frame) const;
     bool getAnimated(EFbxMarkerChannelType channel) const;
     TnFbxTime getTime(EFbxMarkerChannelType channel) const;
-
-    /// The channel itself, owned by the marker; null when there is no such channel.
-    TnFbxChannel* getMarkerChannel(EFbxMarkerChannelType channel);
 
     /// The channel's printable name, a constant; null when there is no such channel.
     static const char* getChannelName(EFbxMarkerChannelType channel);
@@ -73,6 +74,8 @@ public:
     EFbxMarkerLookType getMarkerLookType() const;
 
 private:
+    friend struct detail::MarkerChannels; // for the library: hosts reach channels through the operations above
+
     struct Properties {
         float size = kDefaultMarkerSize;
         EFbxMarkerLookType lookType = kFbxMarkerLookCube;

@@ -70,10 +70,6 @@ bool TnFbxMarker::getAnimated(EFbxMarkerChannelType channel) const { return Chan
 
 TnFbxTime TnFbxMarker::getTime(EFbxMarkerChannelType channel) const { return Channels::time(mChannels, channel); }
 
-TnFbxChannel* TnFbxMarker::getMarkerChannel(EFbxMarkerChannelType channel) {
-    return Channels::find(mChannels, channel);
-}
-
 const char* TnFbxMarker::getChannelName(EFbxMarkerChannelType channel) { return Channels::name(channel); }
 
 bool TnFbxMarker::setMarkerSize(float size) {

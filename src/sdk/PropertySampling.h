@@ -41,6 +41,13 @@ inline int enumNumber(const fbxsdk::FbxProperty& property) { return property.Get
 /// The layers of an animation stack, in order; none of a null stack.
 std::vector<fbxsdk::FbxAnimLayer*> layersOf(fbxsdk::FbxAnimStack* stack);
 
+/// The channels of a marker, which hands them out to nobody else.
+struct MarkerChannels {
+    static TnFbxChannel& of(TnFbxMarker& marker, TnFbxMarker::EFbxMarkerChannelType channel) {
+        return marker.mChannels[static_cast<std::size_t>(channel)];
+    }
+};
+
 /// A channel of an object, which must have it.
 inline TnFbxChannel& channelOf(TnFbxTransform& object, TnFbxTransform::EFbxTransformChannelType channel) {
     return *object.getTransformChannel(channel);
@@ -52,7 +59,7 @@ inline TnFbxChannel& channelOf(TnFbxLight& object, TnFbxLight::EFbxLightChannelT
     return *object.getLightChannel(channel);
 }
 inline TnFbxChannel& channelOf(TnFbxMarker& object, TnFbxMarker::EFbxMarkerChannelType channel) {
-    return *object.getMarkerChannel(channel);
+    return MarkerChannels::of(object, channel);
 }
 
 /// The names under which a vector's components are keyed.

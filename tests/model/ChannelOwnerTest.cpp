@@ -137,7 +137,6 @@ struct Marker : TnFbxMarker {
 
     bool init() { return initMarker(); }
     bool clear() { return deleteMarker(); }
-    TnFbxChannel* channelObject(Channel channel) { return getMarkerChannel(channel); }
 };
 
 struct OwnerNames {

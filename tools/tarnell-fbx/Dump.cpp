@@ -8,6 +8,8 @@
 #include <memory>
 #include <optional>
 #include <type_traits>
+#include <utility>
+#include <vector>
 
 #include "Commands.h"
 #include "FileFacts.h"
@@ -63,8 +65,8 @@ public:
     }
 
     /// All channels of a class with named channels of its own.
-    template <class Object, class Channel>
-    void channels(Object& object, TnFbxChannel* (Object::*find)(Channel)) {
+    template <class Object, class Channel, class Find>
+    void channels(const Find& find) {
         mJson.key("channels");
         mJson.beginObject();
         for (int i = 0;; ++i) {
@@ -73,7 +75,7 @@ public:
             if (!name)
                 break;
             mJson.key(name);
-            print(*(object.*find)(channel));
+            print(find(channel));
         }
         mJson.endObject();
     }
@@ -82,17 +84,20 @@ public:
         enumerator("projection", {"perspective", "orthographic"}, camera.getProjectionType());
         enumerator("apertureMode", {"horizontalAndVertical", "horizontal", "vertical", "focalLength"},
                    camera.getApertureMode());
-        channels(camera, &TnFbxCamera::getCameraChannel);
+        channels<TnFbxCamera, TnFbxCamera::EFbxCameraChannelType>(
+            [&](auto channel) -> const TnFbxChannel& { return *camera.getCameraChannel(channel); });
     }
     void details(TnFbxLight& light) {
         enumerator("type", {"point", "directional", "spot"}, light.getLightType());
         enumerator("decay", {"none", "linear", "quadratic", "cubic"}, light.getDecayType());
-        channels(light, &TnFbxLight::getLightChannel);
+        channels<TnFbxLight, TnFbxLight::EFbxLightChannelType>(
+            [&](auto channel) -> const TnFbxChannel& { return *light.getLightChannel(channel); });
     }
     void details(TnFbxMarker& marker) {
         number("size", marker.getMarkerSize());
         enumerator("look", {"cube", "hardCross", "lightCross", "sphere"}, marker.getMarkerLookType());
-        channels(marker, &TnFbxMarker::getMarkerChannel);
+        channels<TnFbxMarker, TnFbxMarker::EFbxMarkerChannelType>(
+            [&](auto channel) { return copyOf(marker, channel); });
     }
     void details(TnFbxNull& null) {
         number("size", null.getNullSize());
@@ -113,6 +118,20 @@ public:
     }
 
 private:
+    /// Markers do not hand out their channels.
+    static TnFbxChannel copyOf(const TnFbxMarker& marker, TnFbxMarker::EFbxMarkerChannelType channel) {
+        TnFbxChannel copy;
+        copy.setValue(marker.getValue(channel));
+        if (marker.getAnimated(channel)) {
+            const TnFbxTime time = marker.getTime(channel);
+            std::vector<float> samples;
+            for (long long frame = time.getStartFrame(); frame <= time.getEndFrame(); ++frame)
+                samples.push_back(marker.getValueAt(channel, static_cast<float>(frame)));
+            copy.setAnimatedValues(time, std::move(samples));
+        }
+        return copy;
+    }
+
     void print(const TnFbxChannel& channel) {
         if (!channel.getAnimated()) {
             mJson.real(channel.getValue());
