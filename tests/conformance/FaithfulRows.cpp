@@ -393,8 +393,8 @@ void checkFaithfulCurves(LoadedFile& file, Findings& findings) {
                     continue;
                 const auto actual = static_cast<double>(
                     object->getTransformValue(static_cast<TnFbxTransform::EFbxTransformChannelType>(i)));
-                findings.compare(closeTo(actual, curve->second[f], kHandedOutTolerance), [&] {
-                    return "\"" + reference.nodes[index].name + "\" " + kCurves[i] + " at frame " +
+                findings.compare(closeTo(actual, curve->second[f], kHandedOutTolerance), [&, node = index] {
+                    return "\"" + reference.nodes[node].name + "\" " + kCurves[i] + " at frame " +
                            printed(reference.frames[f]) + ": " + printed(actual) + " instead of " +
                            printed(curve->second[f]);
                 });
@@ -447,7 +447,7 @@ void checkFaithfulLenses(LoadedFile& file, Findings& findings) {
             if (found == nodes.end() || !found->second->perspective || f >= found->second->focalLength.size())
                 continue;
             const FaithfulNode& expected = *found->second;
-            const auto value = [&](auto channel) { return static_cast<double>(camera->getValue(channel)); };
+            const auto value = [&read = *camera](auto channel) { return static_cast<double>(read.getValue(channel)); };
             const double focalLength = value(TnFbxCamera::kFbxCameraFocalLength);
             const double width = value(TnFbxCamera::kFbxCameraApertureWidth);
             const double height = value(TnFbxCamera::kFbxCameraApertureHeight);
