@@ -2,6 +2,10 @@
 // Copyright (c) Tarnell FBX contributors
 #include "Normalisation.h"
 
+#include "calls/LastError.h"
+
+#include <string>
+
 namespace Tarnell::Fbx {
 
 namespace {
@@ -9,6 +13,16 @@ namespace {
 fbxsdk::FbxAxisSystem targetAxisSystem() {
     using System = fbxsdk::FbxAxisSystem;
     return System(System::eYAxis, System::eParityOdd, System::eRightHanded);
+}
+
+/// Only a platform of ours can tell.
+template <class Converter>
+int coarserSurfaces(const Converter& converter) {
+    if constexpr (requires { converter.coarserSurfaces(); }) {
+        return converter.coarserSurfaces();
+    } else {
+        return 0;
+    }
 }
 
 } // namespace
@@ -28,15 +42,20 @@ void detail::convertToYUp(fbxsdk::FbxScene& scene) {
     }
 }
 
-void detail::triangulate(fbxsdk::FbxManager* manager, fbxsdk::FbxNode& node) {
+bool detail::Triangulation::visit(fbxsdk::FbxNode& node) {
     fbxsdk::FbxNodeAttribute* attribute = node.GetNodeAttribute();
     if (attribute == nullptr) {
-        return;
+        return true;
     }
     const auto type = attribute->GetAttributeType();
-    if (type == fbxsdk::FbxNodeAttribute::eNurbs || type == fbxsdk::FbxNodeAttribute::ePatch) {
-        fbxsdk::FbxGeometryConverter converter(manager);
-        converter.Triangulate(attribute, /*pReplace*/ true, /*pLegacy*/ false);
+    return (type != fbxsdk::FbxNodeAttribute::eNurbs && type != fbxsdk::FbxNodeAttribute::ePatch) ||
+           mConverter.Triangulate(attribute, /*pReplace*/ true, /*pLegacy*/ false) != nullptr;
+}
+
+void detail::Triangulation::warnOfCoarser() const {
+    if (const int count = coarserSurfaces(mConverter); count > 0) {
+        warn(std::to_string(count) + (count == 1 ? " surface" : " surfaces") +
+             " became a mesh of coarser steps than asked for: the control points are few for so many samples");
     }
 }
 

@@ -11,7 +11,17 @@ namespace Tarnell::Fbx::detail {
 void convertToCentimetres(fbxsdk::FbxScene& scene);
 void convertToYUp(fbxsdk::FbxScene& scene);
 
-/// Puts a mesh in the place of the node's NURBS or patch; a surface that cannot become one stays.
-void triangulate(fbxsdk::FbxManager* manager, fbxsdk::FbxNode& node);
+/// Puts meshes in the place of NURBS and patches, node by node.
+class Triangulation {
+public:
+    explicit Triangulation(fbxsdk::FbxManager* manager) : mConverter(manager) {}
+    /// False when the node's surface cannot become a mesh and stays.
+    bool visit(fbxsdk::FbxNode& node);
+    /// To be called in the end: warns of surfaces that became coarser than they ask for, where the platform can tell.
+    void warnOfCoarser() const;
+
+private:
+    fbxsdk::FbxGeometryConverter mConverter;
+};
 
 } // namespace Tarnell::Fbx::detail

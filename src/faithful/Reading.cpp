@@ -64,8 +64,9 @@ template <>
 constexpr bool kNeedsMeshes<TnFbxMesh> = true;
 
 void triangulateSurfaces(Scene& scene) {
-    detail::walkNodes(scene.scene().GetRootNode(), [&scene](FbxNode& node) {
-        detail::triangulate(scene.manager(), node);
+    detail::Triangulation triangulation(scene.manager());
+    detail::walkNodes(scene.scene().GetRootNode(), [&](FbxNode& node) {
+        triangulation.visit(node);
         const Attribute::EType type = typeOf(node);
         if (type == Attribute::eNurbs || type == Attribute::ePatch || type == Attribute::eNurbsSurface ||
             type == Attribute::eTrimNurbsSurface) {
@@ -73,6 +74,7 @@ void triangulateSurfaces(Scene& scene) {
         }
         return true;
     });
+    triangulation.warnOfCoarser();
 }
 
 /// The nodes that a read is about, parents before their children.

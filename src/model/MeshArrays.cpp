@@ -28,6 +28,17 @@ MeshArrays::~MeshArrays() {
     }
 }
 
+std::uint64_t MeshArrays::bytesOf(std::int64_t polygons, std::int64_t controlPoints, std::int64_t polygonVertices) {
+    if (polygons < 1 || controlPoints < 1 || polygonVertices < 1) {
+        return 0;
+    }
+    constexpr std::size_t corner =
+        sizeof(int) + sizeof(TnFbxMesh::Vector) + sizeof(TnFbxMesh::TextureCoordinate) + sizeof(TnFbxMesh::Colour);
+    return static_cast<std::uint64_t>(polygons) * sizeof(int) +
+           static_cast<std::uint64_t>(controlPoints) * sizeof(TnFbxMesh::Vector) +
+           static_cast<std::uint64_t>(polygonVertices) * corner;
+}
+
 bool MeshArrays::allocate(int polygons, int controlPoints, int polygonVertices) {
     mMesh.initMesh(); // kept: before the check, so that a failure leaves an empty mesh
     if (polygons < 1 || controlPoints < 1 || polygonVertices < 1) {

@@ -7,6 +7,7 @@
 #include "TnFbxMesh.h"
 
 #include <cstddef>
+#include <cstdint>
 #include <vector>
 
 namespace Tarnell::Fbx::detail {
@@ -19,6 +20,9 @@ public:
     MeshArrays(const MeshArrays&) = delete;
     MeshArrays& operator=(const MeshArrays&) = delete;
     ~MeshArrays();
+
+    /// What a mesh of one set of points takes. Nothing where a count is below 1.
+    static std::uint64_t bytesOf(std::int64_t polygons, std::int64_t controlPoints, std::int64_t polygonVertices);
 
     /// To be called first; the mesh is initialised. False when a number is below 1; the mesh is empty then and no array
     /// may be asked for.

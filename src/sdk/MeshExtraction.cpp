@@ -8,6 +8,7 @@
 #include "PropertySampling.h"
 #include "ReadScope.h"
 #include "calls/LastError.h"
+#include "calls/MemoryLimit.h"
 
 #include "model/MeshArrays.h"
 
@@ -178,6 +179,11 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
 
     MeshArrays arrays(mesh);
     const std::int64_t cornerCount = polygonVertexCount(*source);
+    // What there is no room for is counted only, and makes the call fail.
+    if (!mMemory->take(MeshArrays::bytesOf(source->GetPolygonCount(), source->GetControlPointsCount(), cornerCount))) {
+        mesh.initMesh();
+        return scope.finish(succeed());
+    }
     if (cornerCount > std::numeric_limits<int>::max() ||
         !arrays.allocate(source->GetPolygonCount(), source->GetControlPointsCount(), static_cast<int>(cornerCount))) {
         return fail(std::string("the mesh of \"") + node->GetName() + "\" has no polygons or no points");

@@ -182,10 +182,18 @@ bool FbxSdk::convertNurbsAndPatch(fbxsdk::FbxManager* manager, fbxsdk::FbxScene*
 }
 
 bool FbxSdk::convertNurbsAndPatchRecursive(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* node) {
-    return detail::walkNodes(node, [manager](fbxsdk::FbxNode& visited) {
-        detail::triangulate(manager, visited);
+    detail::Triangulation triangulation(manager);
+    int left = 0;
+    const bool result = detail::walkNodes(node, [&](fbxsdk::FbxNode& visited) {
+        left += triangulation.visit(visited) ? 0 : 1;
         return true;
     });
+    triangulation.warnOfCoarser();
+    if (left > 0) {
+        detail::warn(std::to_string(left) + (left == 1 ? " surface" : " surfaces") +
+                     " cannot become a mesh: the numbers make no surface, or one of too many samples");
+    }
+    return result;
 }
 
 // kept: the first stack is read, whatever the options' stack name

@@ -29,6 +29,12 @@ public:
     FbxCriteria operator!() const;
 
     [[nodiscard]] bool isMetBy(const FbxClassId& pClassId) const;
+    /// Made with &&, || or !.
+    [[nodiscard]] bool isCombined() const { return mOperands != nullptr; }
+    /// Whether both are the same without looking into what they are combined of.
+    [[nodiscard]] bool isSame(const FbxCriteria& pOther) const {
+        return mKind == pOther.mKind && mClassId == pOther.mClassId && mOperands == pOther.mOperands;
+    }
 
 private:
     struct Node;

@@ -25,6 +25,13 @@ public:
     FbxNodeAttribute* Triangulate(FbxNodeAttribute* pNodeAttribute, bool pReplace, bool pLegacy = false);
     /// The same for every attribute of the scene that it applies to. False when one of them could not be converted.
     bool Triangulate(FbxScene* pScene, bool pReplace, bool pLegacy = false);
+
+    /// The platform's own: how many surfaces this converter sampled in coarser steps than they ask for, since they ask
+    /// for more than their control points and those of their scene are good for.
+    [[nodiscard]] int coarserSurfaces() const { return mCoarser; }
+
+private:
+    int mCoarser = 0;
 };
 
 FBXSDK_NAMESPACE_END

@@ -121,10 +121,12 @@ bool FbxAnimCurveNode::ConnectToChannel(FbxAnimCurve* pCurve, unsigned int pChan
     if (!pCurve || pChannelId >= mChannels.size())
         return false;
     auto& curves = mChannels[pChannelId].curves;
-    if (std::find(curves.begin(), curves.end(), pCurve) != curves.end())
+    // The curves of all channels are the node's sources.
+    const bool isSource = IsConnectedSrcObject(pCurve);
+    if (isSource && std::find(curves.begin(), curves.end(), pCurve) != curves.end())
         return false;
     curves.insert(pInFront ? curves.begin() : curves.end(), pCurve);
-    if (!IsConnectedSrcObject(pCurve))
+    if (!isSource)
         ConnectSrcObject(pCurve);
     ++GetFbxManager()->data().revision;
     return true;

@@ -5,6 +5,9 @@
 #include "document/LegacyLayout.h"
 
 #include <algorithm>
+#include <iterator>
+#include <map>
+#include <set>
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -34,6 +37,7 @@ LegacyLayout::LegacyLayout(const WritableDocument& document) : mDocument(documen
     for (const WritableObject& object : document.objects)
         mObjects.emplace(object.id, &object);
     findAttributes();
+    findAnimation();
 }
 
 const WritableObject* LegacyLayout::find(std::int64_t id) const {
@@ -68,48 +72,42 @@ bool LegacyLayout::standsAlone(const WritableObject& object) const {
     return !isAnimation(object) && holdersOf(object.id).empty();
 }
 
-std::int64_t LegacyLayout::baseLayerOf(std::string_view stack) const {
+void LegacyLayout::findAnimation() {
     for (const DocumentConnection& connection : mDocument.connections) {
-        const WritableObject* destination = find(connection.destination);
         const WritableObject* source = find(connection.source);
-        if (destination && destination->record == "AnimationStack" && destination->name == stack && source &&
-            source->record == "AnimationLayer")
-            return source->id;
+        const WritableObject* destination = find(connection.destination);
+        if (!source)
+            continue;
+        if (source->record == "AnimationLayer" && destination && destination->record == "AnimationStack")
+            mBaseLayers.emplace(destination->name, source->id);
+        if (source->record == "AnimationCurve")
+            mCurves[connection.destination].emplace(connection.destinationProperty, source);
+        if (source->record != "AnimationCurveNode")
+            continue;
+        mMembers[connection.destination].push_back(source->id);
+        if (!connection.destinationProperty.empty() && destination && !isAnimation(*destination))
+            mDriving[source->id].push_back(&connection);
     }
-    return 0;
 }
 
 LegacyLayout::Driven LegacyLayout::drivenBy(std::string_view stack) const {
-    const std::int64_t layer = baseLayerOf(stack);
-    std::unordered_map<std::int64_t, DrivenProperty> nodes; // of the layer
-    if (layer == 0)
+    const auto layer = mBaseLayers.find(stack);
+    const auto members = layer == mBaseLayers.end() ? mMembers.end() : mMembers.find(layer->second);
+    if (members == mMembers.end())
         return {};
-    for (const DocumentConnection& connection : mDocument.connections) {
-        const WritableObject* node = find(connection.source);
-        if (connection.destination == layer && node && node->record == "AnimationCurveNode")
-            nodes[node->id].node = node;
+    std::set<const DocumentConnection*> connections; // in their order
+    for (const std::int64_t node : members->second) {
+        if (const auto driving = mDriving.find(node); driving != mDriving.end())
+            connections.insert(driving->second.begin(), driving->second.end());
     }
-    for (const DocumentConnection& connection : mDocument.connections) {
-        const WritableObject* curve = find(connection.source);
-        if (const auto node = nodes.find(connection.destination);
-            node != nodes.end() && curve && curve->record == "AnimationCurve")
-            node->second.curves.emplace(connection.destinationProperty, curve);
+    std::map<std::int64_t, std::vector<DrivenProperty>> byObject;
+    for (const DocumentConnection* connection : connections) {
+        DrivenProperty driven{connection->destinationProperty, find(connection->source), {}};
+        if (const auto curves = mCurves.find(connection->source); curves != mCurves.end())
+            driven.curves = curves->second;
+        byObject[connection->destination].push_back(std::move(driven));
     }
-    std::unordered_map<std::int64_t, std::vector<DrivenProperty>> byObject;
-    for (const DocumentConnection& connection : mDocument.connections) {
-        const auto node = nodes.find(connection.source);
-        if (node == nodes.end() || connection.destinationProperty.empty())
-            continue;
-        DrivenProperty driven = node->second;
-        driven.property = connection.destinationProperty;
-        byObject[connection.destination].push_back(std::move(driven));
-    }
-    Driven result;
-    for (const WritableObject& object : mDocument.objects) {
-        if (const auto found = byObject.find(object.id); found != byObject.end() && !isAnimation(object))
-            result.emplace_back(object.id, std::move(found->second));
-    }
-    return result;
+    return {std::make_move_iterator(byObject.begin()), std::make_move_iterator(byObject.end())};
 }
 
 } // namespace detail

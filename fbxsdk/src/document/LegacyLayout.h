@@ -16,7 +16,8 @@ namespace detail {
 struct DrivenProperty {
     std::string_view property;
     const WritableObject* node = nullptr;
-    std::unordered_map<std::string_view, const WritableObject*> curves; ///< by "d|X", …
+    using Curves = std::unordered_map<std::string_view, const WritableObject*>;
+    Curves curves; ///< by "d|X", …
 };
 
 class LegacyLayout {
@@ -42,13 +43,18 @@ public:
 
 private:
     void findAttributes();
-    [[nodiscard]] std::int64_t baseLayerOf(std::string_view stack) const;
+    void findAnimation();
 
     const WritableDocument& mDocument;
     LegacyNames mNames;
     std::unordered_map<std::int64_t, const WritableObject*> mObjects;
     std::unordered_map<std::int64_t, const WritableObject*> mAttributes;
     std::unordered_map<std::int64_t, std::vector<std::int64_t>> mHolders;
+    std::unordered_map<std::string_view, std::int64_t> mBaseLayers; ///< by the name of the first stack that has one
+    // Of each layer its curve nodes, of each curve node its curves and what it drives.
+    std::unordered_map<std::int64_t, std::vector<std::int64_t>> mMembers;
+    std::unordered_map<std::int64_t, DrivenProperty::Curves> mCurves;
+    std::unordered_map<std::int64_t, std::vector<const DocumentConnection*>> mDriving;
 };
 
 } // namespace detail

@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <array>
+#include <set>
 
 #include "document/CurveWriting.h"
 #include "document/DocumentSections.h"
@@ -46,15 +47,25 @@ public:
         const BlockScope block(mSink, "Take", take.name);
         writeTakeTimes(take, mSink);
         const LegacyLayout::Driven driven = mLayout.drivenBy(take.name);
-        for (const WritableObject& object : mLayout.document().objects) {
-            if (object.record == "Model")
-                writeModel(object, driven);
-        }
+        for (const std::int64_t model : modelsOf(driven))
+            writeModel(*mLayout.find(model), driven);
         for (const auto& [id, properties] : driven)
             writeOther(id, properties);
     }
 
 private:
+    /// The Models that are driven, or hold an attribute that is.
+    [[nodiscard]] std::set<std::int64_t> modelsOf(const LegacyLayout::Driven& driven) const {
+        std::set<std::int64_t> models;
+        for (const auto& [id, properties] : driven) {
+            if (mLayout.find(id)->record == "Model")
+                models.insert(id);
+            const std::vector<std::int64_t>& holders = mLayout.holdersOf(id);
+            models.insert(holders.begin(), holders.end());
+        }
+        return models;
+    }
+
     static const std::vector<DrivenProperty>* propertiesOf(const LegacyLayout::Driven& driven, std::int64_t id) {
         const auto found =
             std::lower_bound(driven.begin(), driven.end(), id,

@@ -29,7 +29,7 @@ FbxGeometry* FbxBlendShape::GetGeometry() { return GetDstObject<FbxGeometry>(); 
 bool FbxBlendShape::SetGeometry(FbxGeometry* pGeometry) { return detail::moveToDestination(*this, pGeometry); }
 
 bool FbxBlendShape::AddBlendShapeChannel(FbxBlendShapeChannel* pBlendShapeChannel) {
-    return detail::addSource(*this, mChannels, pBlendShapeChannel);
+    return detail::addSource(*this, pBlendShapeChannel);
 }
 
 FbxBlendShapeChannel* FbxBlendShape::RemoveBlendShapeChannel(FbxBlendShapeChannel* pBlendShapeChannel) {
@@ -63,7 +63,7 @@ bool FbxBlendShapeChannel::SetBlendShapeDeformer(FbxBlendShape* pBlendShape) {
 
 bool FbxBlendShapeChannel::AddTargetShape(FbxShape* pShape, double pFullDeformPercent) {
     const std::size_t index = mTargets.size();
-    if (!detail::addSource(*this, mTargets, pShape))
+    if (!detail::addSource(*this, pShape))
         return false;
     completeFullWeights(index + 1);
     mFullWeights[index] = pFullDeformPercent;

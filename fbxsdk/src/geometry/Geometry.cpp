@@ -37,7 +37,7 @@ FbxGeometry::~FbxGeometry() = default;
 int FbxGeometry::AddDeformer(FbxDeformer* pDeformer) {
     if (!pDeformer)
         return -1;
-    detail::addSource(*this, mDeformers, pDeformer);
+    detail::addSource(*this, pDeformer);
     return detail::indexOf(mDeformers, pDeformer);
 }
 

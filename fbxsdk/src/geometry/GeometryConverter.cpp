@@ -5,15 +5,19 @@
 #include <fbxsdk/FbxGeometryConverter.h>
 
 #include <algorithm>
+#include <memory>
+#include <optional>
 #include <vector>
 
 #include <fbxsdk/FbxMesh.h>
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
 
+#include "geometry/GeometrySource.h"
 #include "geometry/TessellationDeformers.h"
 #include "geometry/TessellationMesh.h"
 #include "geometry/TessellationTriangles.h"
+#include "scene/SceneData.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace {
@@ -32,16 +36,71 @@ FbxMesh* newMeshFor(const FbxGeometry& geometry) {
     return mesh;
 }
 
-FbxMesh* tessellate(FbxGeometry& surface) {
-    const auto grid = detail::TessellationGrid::of(surface, detail::numbersPerPoint(surface));
-    if (!grid)
-        return nullptr;
-    FbxMesh* mesh = newMeshFor(surface);
-    detail::fillMesh(*mesh, *grid);
-    detail::carryMaterial(*mesh, surface);
-    detail::carryDeformers(*mesh, surface, *grid);
-    return mesh;
-}
+/// A surface on its way to a mesh: how it will be sampled, and out of what.
+class SurfaceConversion {
+public:
+    explicit SurfaceConversion(FbxGeometry& surface)
+        : mSurface(surface), mNumbersPerPoint(detail::numbersPerPoint(surface)), mFewest(fewestSamples(surface)),
+          mPlan(detail::planTessellation(surface, mNumbersPerPoint, mFewest)) {}
+
+    [[nodiscard]] bool isCoarser() const { return mPlan && mPlan->coarser; }
+
+    /// Null for what has no samples. The mesh is empty when it may be filled later.
+    [[nodiscard]] FbxMesh* convert() {
+        if (!mPlan)
+            return nullptr;
+        std::unique_ptr<detail::TessellationGrid> grid;
+        mIsLate = mPlan->certainlyFinite && mSurface.GetDeformerCount() == 0;
+        if (!mIsLate)
+            grid = detail::TessellationGrid::of(mSurface, mNumbersPerPoint, mFewest);
+        if (!mIsLate && !grid)
+            return nullptr;
+        if (FbxScene* scene = mSurface.GetScene())
+            scene->sceneData().samplesUsed += samplesBeyondControlPoints();
+        FbxMesh* mesh = newMeshFor(mSurface);
+        if (grid) {
+            detail::fillMesh(*mesh, *grid);
+            detail::carryMaterial(*mesh, mSurface);
+            detail::carryDeformers(*mesh, mSurface, *grid);
+        }
+        return mesh;
+    }
+
+    /// Leaves the surface to the mesh, which fills itself when it is asked for its polygons.
+    void leaveTo(FbxMesh& mesh) const {
+        mSurface.data().disconnectFromSurvivors();
+        auto source = std::make_shared<detail::MeshOfSurface>(mSurface, mFewest);
+        mesh.setSource(
+            std::make_unique<detail::GeometrySource>(detail::GeometrySource{{}, nullptr, std::move(source)}));
+    }
+    [[nodiscard]] bool isLate() const { return mIsLate; }
+
+    /// Fills the mesh at once: the surface stays with its owner.
+    void fill(FbxMesh& mesh) const {
+        const auto grid = detail::TessellationGrid::of(mSurface, mNumbersPerPoint, mFewest);
+        if (!grid)
+            return;
+        detail::fillMesh(mesh, *grid);
+        detail::carryMaterial(mesh, mSurface);
+    }
+
+private:
+    static std::int64_t fewestSamples(const FbxGeometry& surface) {
+        FbxScene* scene = surface.GetScene();
+        const std::int64_t left = detail::kSamplesOfAnyScene - (scene ? scene->sceneData().samplesUsed : 0);
+        return std::clamp<std::int64_t>(left, 0, detail::kSamplesOfAnySurface);
+    }
+
+    [[nodiscard]] std::int64_t samplesBeyondControlPoints() const {
+        const std::int64_t worth = mSurface.GetControlPointsCount() * detail::kSamplesPerControlPoint;
+        return std::max<std::int64_t>(mPlan->samples - worth, 0);
+    }
+
+    FbxGeometry& mSurface;
+    std::int64_t mNumbersPerPoint, mFewest;
+    std::optional<detail::TessellationPlan> mPlan;
+    bool mIsLate = false;
+};
 
 FbxMesh* cutIntoTriangles(FbxMesh& polygons) {
     FbxMesh* mesh = newMeshFor(polygons);
@@ -73,14 +132,47 @@ void replaceOn(FbxNode& node, FbxNodeAttribute& former, FbxNodeAttribute& mesh) 
         node.ConnectSrcObject(*place);
 }
 
-void replaceEverywhere(FbxGeometry& former, FbxMesh& mesh) {
+/// False when something else needs the former one.
+bool replaceEverywhere(FbxGeometry& former, FbxMesh& mesh) {
     for (FbxNode* node : nodesOf(former))
         replaceOn(*node, former, mesh);
     // A trimmed surface still needs what it is cut from.
     if (former.GetDstObjectCount<FbxNodeAttribute>() > 0)
-        return;
+        return false;
     detail::destroyDeformers(former);
-    former.Destroy();
+    return true;
+}
+
+void putBeside(const FbxGeometry& former, FbxMesh& mesh) {
+    for (FbxNode* node : nodesOf(former))
+        node->ConnectSrcObject(&mesh);
+}
+
+FbxMesh* triangulateSurface(FbxGeometry& surface, bool replace, int& coarser) {
+    SurfaceConversion conversion(surface);
+    FbxMesh* mesh = conversion.convert();
+    if (!mesh)
+        return nullptr;
+    coarser += conversion.isCoarser() ? 1 : 0;
+    const bool isFree = replace && replaceEverywhere(surface, *mesh);
+    if (!replace)
+        putBeside(surface, *mesh);
+    if (conversion.isLate() && isFree)
+        conversion.leaveTo(*mesh);
+    else if (conversion.isLate())
+        conversion.fill(*mesh);
+    else if (isFree)
+        surface.Destroy();
+    return mesh;
+}
+
+FbxMesh* triangulateMesh(FbxMesh& polygons, bool replace) {
+    FbxMesh* mesh = cutIntoTriangles(polygons);
+    if (!replace)
+        putBeside(polygons, *mesh);
+    else if (replaceEverywhere(polygons, *mesh))
+        polygons.Destroy();
+    return mesh;
 }
 
 } // namespace
@@ -91,17 +183,8 @@ FbxNodeAttribute* FbxGeometryConverter::Triangulate(FbxNodeAttribute* pNodeAttri
         return polygons;
     if (!polygons && (!pNodeAttribute || !isSurface(*pNodeAttribute)))
         return nullptr;
-    auto& geometry = static_cast<FbxGeometry&>(*pNodeAttribute);
-    FbxMesh* mesh = polygons ? cutIntoTriangles(*polygons) : tessellate(geometry);
-    if (!mesh)
-        return nullptr;
-    if (pReplace) {
-        replaceEverywhere(geometry, *mesh);
-    } else {
-        for (FbxNode* node : nodesOf(geometry))
-            node->ConnectSrcObject(mesh);
-    }
-    return mesh;
+    return polygons ? triangulateMesh(*polygons, pReplace)
+                    : triangulateSurface(static_cast<FbxGeometry&>(*pNodeAttribute), pReplace, mCoarser);
 }
 
 bool FbxGeometryConverter::Triangulate(FbxScene* pScene, bool pReplace, bool pLegacy) {

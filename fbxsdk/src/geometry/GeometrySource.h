@@ -12,11 +12,13 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
 struct Document;
+struct MeshOfSurface;
 
 /// The sub-records of one object of a file. The document is held only to keep the records alive.
 struct GeometrySource {
     std::shared_ptr<const Document> document;
     const Record* body = nullptr;
+    std::shared_ptr<const MeshOfSurface> surface{}; ///< of a mesh that is made of one; there is no document then
 };
 
 /// The arrays of one layer element; null for an array that the element has not.

@@ -7,6 +7,7 @@
 #include "geometry/GeometryReading.h"
 #include "geometry/ItemReading.h"
 #include "geometry/LayerReading.h"
+#include "geometry/TessellationMesh.h"
 #include "scene/ManagerData.h"
 #include "scene/Schema.h"
 
@@ -47,6 +48,8 @@ FbxMesh::~FbxMesh() = default;
 FbxNodeAttribute::EType FbxMesh::GetAttributeType() const { return eMesh; }
 
 bool FbxMesh::readSource(const detail::GeometrySource& pSource) {
+    if (pSource.surface)
+        return detail::fillMesh(*this, *pSource.surface);
     detail::readMesh(*this, pSource);
     detail::readLayers(*this, pSource);
     if (const detail::Record* edges = pSource.body->child("Edges"))

@@ -21,7 +21,7 @@ FbxSkin::~FbxSkin() = default;
 
 FbxDeformer::EDeformerType FbxSkin::GetDeformerType() const { return eSkin; }
 
-bool FbxSkin::AddCluster(FbxCluster* pCluster) { return detail::addSource(*this, mClusters, pCluster); }
+bool FbxSkin::AddCluster(FbxCluster* pCluster) { return detail::addSource(*this, pCluster); }
 
 FbxCluster* FbxSkin::RemoveCluster(FbxCluster* pCluster) { return detail::removeSource(*this, mClusters, pCluster); }
 

@@ -21,9 +21,10 @@ template <class T>
 /// -1 when it is not there.
 template <class T>
 [[nodiscard]] int indexOf(const std::vector<T*>& sources, const FbxObject* object) {
+    // What was added last is mostly asked for: search from the back.
     const auto found =
-        std::find_if(sources.begin(), sources.end(), [object](const T* source) { return source == object; });
-    return found == sources.end() ? -1 : static_cast<int>(found - sources.begin());
+        std::find_if(sources.rbegin(), sources.rend(), [object](const T* source) { return source == object; });
+    return static_cast<int>(sources.rend() - found) - 1;
 }
 
 /// To be called from connectionChanged of the destination. Returns the place where a source was removed; -1 when none
@@ -32,19 +33,20 @@ template <class T>
 int followConnection(std::vector<T*>& sources, FbxObject& source, bool connected) {
     if (!source.Is<T>())
         return -1;
-    const int index = indexOf(sources, &source);
-    if (connected && index < 0)
-        sources.push_back(static_cast<T*>(&source));
-    if (connected || index < 0)
+    if (connected) {
+        sources.push_back(static_cast<T*>(&source)); // objects are connected once
         return -1;
-    sources.erase(sources.begin() + index);
+    }
+    const int index = indexOf(sources, &source);
+    if (index >= 0)
+        sources.erase(sources.begin() + index);
     return index;
 }
 
 /// Connects when it is not connected already.
 template <class T>
-bool addSource(FbxObject& destination, const std::vector<T*>& sources, T* source) {
-    return source && indexOf(sources, source) < 0 && destination.ConnectSrcObject(source);
+bool addSource(FbxObject& destination, T* source) {
+    return source && destination.ConnectSrcObject(source);
 }
 
 template <class T>

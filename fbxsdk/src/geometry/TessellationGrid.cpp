@@ -120,6 +120,7 @@ std::optional<std::pair<int, int>> stepsWithin(int spansU, int spansV, int stepU
 
 struct SampledSurface {
     SampledDirection u, v;
+    bool coarser = false;
     bool flipped = false;
     bool rational = false;
 };
@@ -134,7 +135,8 @@ std::optional<SampledSurface> sampleBoth(const Direction& u, const Direction& v,
     auto sampledV = sampleDirection(v, steps->second);
     if (!sampledU || !sampledV)
         return std::nullopt;
-    return SampledSurface{std::move(*sampledU), std::move(*sampledV), false, false};
+    const bool coarser = steps->first < wanted.first || steps->second < wanted.second;
+    return SampledSurface{std::move(*sampledU), std::move(*sampledV), coarser, false, false};
 }
 
 std::optional<SampledSurface> sampleNurbs(const FbxNurbsSurfaceBase& surface, std::int64_t budget) {
@@ -166,16 +168,48 @@ std::optional<SampledSurface> samplePatch(const FbxPatch& patch, std::int64_t bu
     return sampleBoth(u, v, segmentCount(u), segmentCount(v), {patch.GetUStep(), patch.GetVStep()}, budget);
 }
 
-std::optional<SampledSurface> sampleGeometry(const FbxGeometry& geometry, std::int64_t numbersPerPoint) {
+std::optional<SampledSurface> sampleGeometry(const FbxGeometry& geometry, std::int64_t numbersPerPoint,
+                                             std::int64_t fewest) {
     const std::int64_t controlPoints = geometry.GetControlPointsCount();
     if (const auto* patch = FbxCast<FbxPatch>(&geometry))
-        return samplePatch(*patch, sampleBudget(controlPoints, 16, numbersPerPoint));
+        return samplePatch(*patch, sampleBudget(controlPoints, 16, numbersPerPoint, fewest));
     const FbxNodeAttribute::EType type = geometry.GetAttributeType();
     if (type != FbxNodeAttribute::eNurbs && type != FbxNodeAttribute::eNurbsSurface)
         return std::nullopt;
     const auto& surface = static_cast<const FbxNurbsSurfaceBase&>(geometry);
     const std::int64_t shares = std::int64_t{surface.GetUOrder()} * surface.GetVOrder();
-    return sampleNurbs(surface, sampleBudget(controlPoints, shares, numbersPerPoint));
+    return sampleNurbs(surface, sampleBudget(controlPoints, shares, numbersPerPoint, fewest));
+}
+
+/// Whether the numbers of control points go together.
+bool fits(const SampledSurface& sampled, const FbxGeometry& geometry) {
+    return geometry.GetControlPoints() &&
+           std::int64_t{sampled.u.points} * sampled.v.points == std::int64_t{geometry.GetControlPointsCount()};
+}
+
+/// Whether every sample is a mean of control points: shares that are not negative and add up to about 1.
+bool isBlend(const SampledDirection& direction) {
+    for (int sample = 0; sample < direction.sampleCount(); ++sample) {
+        double sum = 0.0;
+        for (const BasisTerm& term : direction.termsOf(sample)) {
+            if (!(term.weight >= 0.0))
+                return false;
+            sum += term.weight;
+        }
+        if (!(sum > 0.5 && sum < 2.0))
+            return false;
+    }
+    return true;
+}
+
+/// Whether no mean of the points can be without a finite place.
+bool areModerate(const Vector* points, const SampledSurface& surface) {
+    constexpr double kLargest = 1e90, kSmallestWeight = 1e-90;
+    return std::all_of(points, points + std::ptrdiff_t{surface.u.points} * surface.v.points, [&](const Vector& point) {
+        const bool weighted = !surface.rational || (point[3] >= kSmallestWeight && point[3] <= kLargest);
+        return weighted && std::abs(point[0]) <= kLargest && std::abs(point[1]) <= kLargest &&
+               std::abs(point[2]) <= kLargest;
+    });
 }
 
 } // namespace
@@ -190,21 +224,33 @@ FbxVector4 unitVector(const FbxVector4& vector) {
     return result;
 }
 
-std::int64_t sampleBudget(std::int64_t controlPoints, std::int64_t sharesPerSample, std::int64_t numbersPerPoint) {
-    constexpr std::int64_t kSamplesPerPoint = 64; // eight steps both ways
-    constexpr std::int64_t kFewest = std::int64_t{1} << 14, kUsual = std::int64_t{1} << 20;
+std::int64_t sampleBudget(std::int64_t controlPoints, std::int64_t sharesPerSample, std::int64_t numbersPerPoint,
+                          std::int64_t fewest) {
+    constexpr std::int64_t kUsual = std::int64_t{1} << 20;
     constexpr std::int64_t kMostShares = std::int64_t{1} << 28;
-    const std::int64_t bySize = std::clamp(controlPoints, kFewest / kSamplesPerPoint, kUsual / kSamplesPerPoint);
+    const std::int64_t bySize =
+        std::clamp(controlPoints, fewest / kSamplesPerControlPoint, kUsual / kSamplesPerControlPoint);
     const std::int64_t byShares = kMostShares / std::max<std::int64_t>(sharesPerSample, 1) / (1 + numbersPerPoint);
-    return std::min(bySize * kSamplesPerPoint, byShares);
+    return std::min(bySize * kSamplesPerControlPoint, byShares);
 }
 
-std::unique_ptr<TessellationGrid> TessellationGrid::of(const FbxGeometry& geometry, std::int64_t numbersPerPoint) {
-    auto sampled = sampleGeometry(geometry, numbersPerPoint);
-    const FbxVector4* points = geometry.GetControlPoints();
-    if (!sampled || !points ||
-        std::int64_t{sampled->u.points} * sampled->v.points != std::int64_t{geometry.GetControlPointsCount()})
+std::optional<TessellationPlan> planTessellation(const FbxGeometry& geometry, std::int64_t numbersPerPoint,
+                                                 std::int64_t fewest) {
+    const auto sampled = sampleGeometry(geometry, numbersPerPoint, fewest);
+    if (!sampled || !fits(*sampled, geometry))
+        return std::nullopt;
+    const bool finite =
+        isBlend(sampled->u) && isBlend(sampled->v) && areModerate(geometry.GetControlPoints(), *sampled);
+    return TessellationPlan{std::int64_t{sampled->u.sampleCount()} * sampled->v.sampleCount(), sampled->coarser,
+                            finite};
+}
+
+std::unique_ptr<TessellationGrid> TessellationGrid::of(const FbxGeometry& geometry, std::int64_t numbersPerPoint,
+                                                       std::int64_t fewest) {
+    auto sampled = sampleGeometry(geometry, numbersPerPoint, fewest);
+    if (!sampled || !fits(*sampled, geometry))
         return nullptr;
+    const FbxVector4* points = geometry.GetControlPoints();
     const std::span controlPoints(points, static_cast<std::size_t>(geometry.GetControlPointsCount()));
     std::unique_ptr<TessellationGrid> grid(new TessellationGrid(std::move(sampled->u), std::move(sampled->v),
                                                                 sampled->flipped, sampled->rational, controlPoints));

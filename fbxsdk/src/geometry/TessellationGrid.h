@@ -20,11 +20,28 @@ namespace detail {
 
 /// A surface that has more samples with single steps is not tessellated.
 inline constexpr std::int64_t kMostSamples = std::int64_t{1} << 22;
+/// Every control point is good for so many samples: eight steps both ways.
+inline constexpr std::int64_t kSamplesPerControlPoint = 64;
+/// A surface of few control points may have so many all the same …
+inline constexpr std::int64_t kSamplesOfAnySurface = std::int64_t{1} << 14;
+/// … as long as those of all surfaces of a scene, beyond what their control points are good for, are not more than
+/// this.
+inline constexpr std::int64_t kSamplesOfAnyScene = std::int64_t{1} << 19;
 
 /// How many samples a surface may have before its steps are made coarser. What a file costs stays in proportion to what
 /// stands in it: to its control points, and to the numbers that deformers will need for each sample.
 [[nodiscard]] std::int64_t sampleBudget(std::int64_t controlPoints, std::int64_t sharesPerSample,
-                                        std::int64_t numbersPerPoint);
+                                        std::int64_t numbersPerPoint, std::int64_t fewest = kSamplesOfAnySurface);
+
+/// What the samples of a surface will be.
+struct TessellationPlan {
+    std::int64_t samples = 0;
+    bool coarser = false;        ///< than the surface asks for
+    bool certainlyFinite = true; ///< no sample can turn out to have no finite place
+};
+/// The plan by which TessellationGrid::of samples the surface; empty when it has none for certain.
+[[nodiscard]] std::optional<TessellationPlan> planTessellation(const FbxGeometry& geometry,
+                                                               std::int64_t numbersPerPoint, std::int64_t fewest);
 
 /// The vector at length 1; zero for a vector without length, or without a finite one.
 [[nodiscard]] FbxVector4 unitVector(const FbxVector4& vector);
@@ -34,8 +51,8 @@ class TessellationGrid {
 public:
     /// Samples a NURBS surface or a patch; null for other geometry and for one that has no surface: numbers that do not
     /// fit together, or samples without a finite place. `numbersPerPoint` is what deformers will add.
-    [[nodiscard]] static std::unique_ptr<TessellationGrid> of(const FbxGeometry& geometry,
-                                                              std::int64_t numbersPerPoint);
+    [[nodiscard]] static std::unique_ptr<TessellationGrid> of(const FbxGeometry& geometry, std::int64_t numbersPerPoint,
+                                                              std::int64_t fewest = kSamplesOfAnySurface);
 
     [[nodiscard]] const SampledDirection& u() const { return mU; }
     [[nodiscard]] const SampledDirection& v() const { return mV; }

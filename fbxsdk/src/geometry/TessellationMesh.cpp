@@ -6,6 +6,8 @@
 
 #include <algorithm>
 
+#include "scene/ManagerData.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
@@ -103,6 +105,20 @@ void carryMaterial(FbxMesh& mesh, FbxGeometry& surface) {
     element->SetReferenceMode(FbxLayerElement::eIndexToDirect);
     element->GetIndexArray().Add(materials->GetIndexArray().GetFirst());
     mesh.GetLayer(0)->SetMaterials(element);
+}
+
+MeshOfSurface::~MeshOfSurface() {
+    if (!surface.GetFbxManager()->data().tearingDown) // which frees it by itself
+        surface.Destroy();
+}
+
+bool fillMesh(FbxMesh& mesh, const MeshOfSurface& source) {
+    const auto grid = TessellationGrid::of(source.surface, /*numbersPerPoint*/ 0, source.fewest);
+    if (!grid)
+        return false;
+    fillMesh(mesh, *grid);
+    carryMaterial(mesh, source.surface);
+    return true;
 }
 
 } // namespace detail

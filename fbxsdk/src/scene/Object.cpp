@@ -142,30 +142,28 @@ bool FbxObject::ConnectDstProperty(const FbxProperty& pProperty) {
     return destination.ConnectSrcObject(this);
 }
 
-int FbxObject::GetSrcObjectCount() const { return detail::countObjects(mData->plug.sources, FbxCriteria()); }
+int FbxObject::GetSrcObjectCount() const { return mData->plug.sources.countObjects(FbxCriteria()); }
 int FbxObject::GetSrcObjectCount(const FbxCriteria& pCriteria) const {
-    return detail::countObjects(mData->plug.sources, pCriteria);
+    return mData->plug.sources.countObjects(pCriteria);
 }
-FbxObject* FbxObject::GetSrcObject(int pIndex) const {
-    return detail::objectAt(mData->plug.sources, FbxCriteria(), pIndex);
-}
+FbxObject* FbxObject::GetSrcObject(int pIndex) const { return mData->plug.sources.objectAt(FbxCriteria(), pIndex); }
 FbxObject* FbxObject::GetSrcObject(const FbxCriteria& pCriteria, int pIndex) const {
-    return detail::objectAt(mData->plug.sources, pCriteria, pIndex);
+    return mData->plug.sources.objectAt(pCriteria, pIndex);
 }
-int FbxObject::GetDstObjectCount() const { return detail::countObjects(mData->plug.destinations, FbxCriteria()); }
+int FbxObject::GetDstObjectCount() const { return mData->plug.destinations.countObjects(FbxCriteria()); }
 int FbxObject::GetDstObjectCount(const FbxCriteria& pCriteria) const {
-    return detail::countObjects(mData->plug.destinations, pCriteria);
+    return mData->plug.destinations.countObjects(pCriteria);
 }
 FbxObject* FbxObject::GetDstObject(int pIndex) const {
-    return detail::objectAt(mData->plug.destinations, FbxCriteria(), pIndex);
+    return mData->plug.destinations.objectAt(FbxCriteria(), pIndex);
 }
 FbxObject* FbxObject::GetDstObject(const FbxCriteria& pCriteria, int pIndex) const {
-    return detail::objectAt(mData->plug.destinations, pCriteria, pIndex);
+    return mData->plug.destinations.objectAt(pCriteria, pIndex);
 }
-int FbxObject::GetSrcPropertyCount() const { return detail::countProperties(mData->plug.sources); }
-FbxProperty FbxObject::GetSrcProperty(int pIndex) const { return detail::propertyAt(mData->plug.sources, pIndex); }
-int FbxObject::GetDstPropertyCount() const { return detail::countProperties(mData->plug.destinations); }
-FbxProperty FbxObject::GetDstProperty(int pIndex) const { return detail::propertyAt(mData->plug.destinations, pIndex); }
+int FbxObject::GetSrcPropertyCount() const { return mData->plug.sources.countProperties(); }
+FbxProperty FbxObject::GetSrcProperty(int pIndex) const { return mData->plug.sources.propertyAt(pIndex); }
+int FbxObject::GetDstPropertyCount() const { return mData->plug.destinations.countProperties(); }
+FbxProperty FbxObject::GetDstProperty(int pIndex) const { return mData->plug.destinations.propertyAt(pIndex); }
 
 void FbxObject::connectionChanged(FbxObject&, FbxObject&, bool) {}
 

@@ -126,10 +126,8 @@ unsigned defaultFlags(const PropertyRow& row) { return flagsOf(row); }
 
 bool isConnected(const ConnectionPoint& source, const ConnectionPoint& destination) {
     // Either list tells; the shorter one is quicker, and the list of a scene's members is long.
-    const auto& ends = source.destinations;
-    const auto& starts = destination.sources;
-    return ends.size() <= starts.size() ? std::find(ends.begin(), ends.end(), &destination) != ends.end()
-                                        : std::find(starts.begin(), starts.end(), &source) != starts.end();
+    const bool byEnds = source.destinations.size() <= destination.sources.size();
+    return byEnds ? source.destinations.contains(destination) : destination.sources.contains(source);
 }
 
 void joinScene(FbxObject& object, FbxScene& scene) {
@@ -149,9 +147,9 @@ void joinScene(FbxObject& object, FbxScene& scene) {
         each->data().announceScene(&scene);
         // What feeds a member is a member. Pushed in reverse, so that the first source enters first.
         const auto pushSources = [&](const ConnectionPoint& point) {
-            for (auto source = point.sources.rbegin(); source != point.sources.rend(); ++source) {
+            const auto& sources = point.sources.all();
+            for (auto source = sources.rbegin(); source != sources.rend(); ++source)
                 pending.push_back((*source)->object);
-            }
         };
         for (const auto& property : each->data().properties)
             pushSources(property->plug);
@@ -173,8 +171,8 @@ void ObjectData::announce(FbxObject& source, FbxObject& destination, bool connec
 }
 
 void ObjectData::link(ConnectionPoint& source, ConnectionPoint& destination) {
-    source.destinations.push_back(&destination);
-    destination.sources.push_back(&source);
+    source.destinations.append(destination);
+    destination.sources.append(source);
 }
 
 bool ObjectData::connect(ConnectionPoint& source, ConnectionPoint& destination) {
@@ -196,18 +194,15 @@ bool ObjectData::connect(ConnectionPoint& source, ConnectionPoint& destination) 
 }
 
 bool ObjectData::disconnect(ConnectionPoint& source, ConnectionPoint& destination) {
-    // What was connected last is mostly cut first: search from the back.
-    const auto end = std::find(source.destinations.rbegin(), source.destinations.rend(), &destination);
-    if (end == source.destinations.rend())
+    if (!isConnected(source, destination))
         return false;
     FbxObject& from = *source.object;
     FbxObject& to = *destination.object;
     const bool leaves = from.GetScene() == &to && betweenObjects(source, destination);
     if (leaves && from.GetScene()->sceneData().isFixed(from))
         return false;
-    source.destinations.erase(std::next(end).base());
-    const auto start = std::find(destination.sources.rbegin(), destination.sources.rend(), &source);
-    destination.sources.erase(std::next(start).base());
+    source.destinations.remove(destination);
+    destination.sources.remove(source);
     noteChange(to);
     if (!betweenObjects(source, destination))
         return true;
@@ -220,12 +215,12 @@ bool ObjectData::disconnect(ConnectionPoint& source, ConnectionPoint& destinatio
 void ObjectData::disconnectFromSurvivors() {
     const auto cut = [](ConnectionPoint& point) {
         // In reverse order of connection, over copies: cutting changes the lists.
-        const auto sources = point.sources;
+        const auto sources = point.sources.all();
         for (auto each = sources.rbegin(); each != sources.rend(); ++each) {
             if (!(*each)->object->data().doomed)
                 disconnect(**each, point);
         }
-        const auto destinations = point.destinations;
+        const auto destinations = point.destinations.all();
         for (auto each = destinations.rbegin(); each != destinations.rend(); ++each) {
             if (!(*each)->object->data().doomed)
                 disconnect(point, **each);
@@ -234,39 +229,6 @@ void ObjectData::disconnectFromSurvivors() {
     for (const auto& property : properties)
         cut(property->plug);
     cut(plug);
-}
-
-int countObjects(const std::vector<ConnectionPoint*>& points, const FbxCriteria& criteria) {
-    return static_cast<int>(std::count_if(points.begin(), points.end(), [&](const ConnectionPoint* point) {
-        return point->property < 0 && criteria.isMetBy(point->object->GetClassId());
-    }));
-}
-
-FbxObject* objectAt(const std::vector<ConnectionPoint*>& points, const FbxCriteria& criteria, int index) {
-    if (index < 0)
-        return nullptr;
-    for (const ConnectionPoint* point : points) {
-        if (point->property >= 0 || !criteria.isMetBy(point->object->GetClassId()))
-            continue;
-        if (index-- == 0)
-            return point->object;
-    }
-    return nullptr;
-}
-
-int countProperties(const std::vector<ConnectionPoint*>& points) {
-    return static_cast<int>(
-        std::count_if(points.begin(), points.end(), [](const ConnectionPoint* point) { return point->property >= 0; }));
-}
-
-FbxProperty propertyAt(const std::vector<ConnectionPoint*>& points, int index) {
-    if (index < 0)
-        return {};
-    for (const ConnectionPoint* point : points) {
-        if (point->property >= 0 && index-- == 0)
-            return {point->object, point->property};
-    }
-    return {};
 }
 
 } // namespace detail

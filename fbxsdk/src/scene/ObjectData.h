@@ -19,6 +19,8 @@
 #include <fbxsdk/FbxDataType.h>
 #include <fbxsdk/FbxObject.h>
 
+#include "scene/ConnectionList.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
@@ -44,8 +46,8 @@ struct ClassInfo {
 struct ConnectionPoint {
     FbxObject* object = nullptr;
     int property = -1; ///< index of the property; -1 for the object itself
-    std::vector<ConnectionPoint*> sources;
-    std::vector<ConnectionPoint*> destinations;
+    ConnectionList sources;
+    ConnectionList destinations;
 };
 
 struct PropertyValue {
@@ -115,12 +117,6 @@ inline constexpr int kRootProperty = -1;
 void joinScene(FbxObject& object, FbxScene& scene);
 /// Ends the object's membership. What feeds it stays: it is a source of the scene in its own right.
 void leaveScene(FbxObject& object);
-
-// Queries over one list of connections: objects that meet the criteria, or properties, in order.
-[[nodiscard]] int countObjects(const std::vector<ConnectionPoint*>& points, const FbxCriteria& criteria);
-[[nodiscard]] FbxObject* objectAt(const std::vector<ConnectionPoint*>& points, const FbxCriteria& criteria, int index);
-[[nodiscard]] int countProperties(const std::vector<ConnectionPoint*>& points);
-[[nodiscard]] FbxProperty propertyAt(const std::vector<ConnectionPoint*>& points, int index);
 
 /// A typed member of a class, bound to the row of that name.
 template <class T>

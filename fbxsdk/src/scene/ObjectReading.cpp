@@ -10,7 +10,6 @@
 
 #include <fbxsdk/FbxAnimCurve.h>
 #include <fbxsdk/FbxAnimCurveNode.h>
-#include <fbxsdk/FbxAnimStack.h>
 #include <fbxsdk/FbxCamera.h>
 #include <fbxsdk/FbxDeformer.h>
 #include <fbxsdk/FbxGeometryBase.h>
@@ -131,24 +130,6 @@ void readCurveKeys(const Reading& reading) {
     keys.after = extrapolationOf(curve.post);
 }
 
-/// A stack that says nothing of its spans has them from the take of its name.
-void readStack(const Reading& reading) {
-    auto& stack = reading.as<FbxAnimStack>();
-    for (const DocumentTake& take : reading.document->takes) {
-        if (take.name != reading.source.name)
-            continue;
-        const bool local = reading.source.property("LocalStart") || reading.source.property("LocalStop");
-        const bool reference = reading.source.property("ReferenceStart") || reading.source.property("ReferenceStop");
-        if (!local && take.hasLocal) {
-            stack.SetLocalTimeSpan(FbxTimeSpan(FbxTime(take.localStart), FbxTime(take.localStop)));
-        }
-        if (!reference && take.hasReference) {
-            stack.SetReferenceTimeSpan(FbxTimeSpan(FbxTime(take.referenceStart), FbxTime(take.referenceStop)));
-        }
-        return;
-    }
-}
-
 void readMaterial(const Reading& reading) {
     const std::string model = textOf(reading.record("ShadingModel"));
     if (!model.empty())
@@ -185,7 +166,6 @@ const ClassReader kReaders[] = {
     {FbxSubDeformer::ClassId, readAnyDeformer},
     {FbxSurfaceMaterial::ClassId, readMaterial},
     {FbxFileTexture::ClassId, readFileTexture},
-    {FbxAnimStack::ClassId, readStack},
     {FbxAnimCurveNode::ClassId, readCurveNode},
     {FbxAnimCurve::ClassId, readCurveKeys},
 };

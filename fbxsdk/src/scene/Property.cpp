@@ -226,35 +226,31 @@ bool FbxProperty::IsConnectedSrcObject(const FbxObject* pObject) const {
 
 namespace {
 
-const std::vector<detail::ConnectionPoint*>& sourcesOf(const FbxProperty& property) {
-    static const std::vector<detail::ConnectionPoint*> kNone;
+const detail::ConnectionList& sourcesOf(const FbxProperty& property) {
+    static const detail::ConnectionList kNone;
     const PropertyData* data = exists(property) ? dataOf(property) : nullptr;
     return data ? data->plug.sources : kNone;
 }
 
-const std::vector<detail::ConnectionPoint*>& destinationsOf(const FbxProperty& property) {
-    static const std::vector<detail::ConnectionPoint*> kNone;
+const detail::ConnectionList& destinationsOf(const FbxProperty& property) {
+    static const detail::ConnectionList kNone;
     const PropertyData* data = exists(property) ? dataOf(property) : nullptr;
     return data ? data->plug.destinations : kNone;
 }
 
 } // namespace
 
-int FbxProperty::GetSrcObjectCount() const { return detail::countObjects(sourcesOf(*this), FbxCriteria()); }
+int FbxProperty::GetSrcObjectCount() const { return sourcesOf(*this).countObjects(FbxCriteria()); }
 int FbxProperty::GetSrcObjectCount(const FbxCriteria& pCriteria) const {
-    return detail::countObjects(sourcesOf(*this), pCriteria);
+    return sourcesOf(*this).countObjects(pCriteria);
 }
-FbxObject* FbxProperty::GetSrcObject(int pIndex) const {
-    return detail::objectAt(sourcesOf(*this), FbxCriteria(), pIndex);
-}
+FbxObject* FbxProperty::GetSrcObject(int pIndex) const { return sourcesOf(*this).objectAt(FbxCriteria(), pIndex); }
 FbxObject* FbxProperty::GetSrcObject(const FbxCriteria& pCriteria, int pIndex) const {
-    return detail::objectAt(sourcesOf(*this), pCriteria, pIndex);
+    return sourcesOf(*this).objectAt(pCriteria, pIndex);
 }
-int FbxProperty::GetDstObjectCount() const { return detail::countObjects(destinationsOf(*this), FbxCriteria()); }
-FbxObject* FbxProperty::GetDstObject(int pIndex) const {
-    return detail::objectAt(destinationsOf(*this), FbxCriteria(), pIndex);
-}
-int FbxProperty::GetSrcPropertyCount() const { return detail::countProperties(sourcesOf(*this)); }
-FbxProperty FbxProperty::GetSrcProperty(int pIndex) const { return detail::propertyAt(sourcesOf(*this), pIndex); }
+int FbxProperty::GetDstObjectCount() const { return destinationsOf(*this).countObjects(FbxCriteria()); }
+FbxObject* FbxProperty::GetDstObject(int pIndex) const { return destinationsOf(*this).objectAt(FbxCriteria(), pIndex); }
+int FbxProperty::GetSrcPropertyCount() const { return sourcesOf(*this).countProperties(); }
+FbxProperty FbxProperty::GetSrcProperty(int pIndex) const { return sourcesOf(*this).propertyAt(pIndex); }
 
 FBXSDK_NAMESPACE_END

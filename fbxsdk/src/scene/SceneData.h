@@ -30,6 +30,8 @@ struct SceneData {
     FbxAnimStack* currentStack = nullptr;
     std::vector<FbxNode*> nodes;       ///< in order of entry
     std::vector<FbxAnimStack*> stacks; ///< likewise
+    /// How many samples surfaces that became meshes have beyond what their control points are good for.
+    std::int64_t samplesUsed = 0;
     /// The files that were read into the scene; geometry is read from them on first use.
     std::vector<std::shared_ptr<const Document>> documents;
 

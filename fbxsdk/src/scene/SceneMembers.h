@@ -12,7 +12,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
 template <class T>
-std::vector<T*> objectsIn(const std::vector<ConnectionPoint*>& points) {
+std::vector<T*> objectsIn(const ConnectionList& points) {
     std::vector<T*> found;
     for (const ConnectionPoint* point : points) {
         if (point->property < 0 && point->object->Is<T>())

@@ -20,8 +20,12 @@
 #include <fbxsdk/FbxTrimNurbsSurface.h>
 #include <fbxsdk/FbxVertexCacheDeformer.h>
 
+#include <limits>
+
 #include "GeometryFixture.h"
 #include "NurbsSamples.h"
+#include "geometry/TessellationGrid.h"
+#include "scene/ManagerData.h"
 
 namespace fbxsdk {
 namespace {
@@ -533,6 +537,57 @@ TEST_F(GeometryConverter, SaysWhenPartOfASceneCouldNotBeConverted) {
     EXPECT_FALSE(converter.Triangulate(scene, true));
     EXPECT_TRUE(node->GetMesh()->IsTriangleMesh());
     EXPECT_FALSE(converter.Triangulate(static_cast<FbxScene*>(nullptr), true));
+}
+
+TEST_F(GeometryConverter, FillsTheMeshOfAReplacedSurfaceWithWhatOneBesideItHas) {
+    FbxPatch* patch = bilinear(3);
+    FbxMesh* beside = converted(patch, false);
+
+    FbxMesh* late = converted(patch);
+
+    ASSERT_TRUE(beside && late);
+    EXPECT_EQ(scene->GetSrcObjectCount<FbxPatch>(), 0);
+    EXPECT_EQ(cornersOf(*late), cornersOf(*beside));
+    ASSERT_EQ(late->GetControlPointsCount(), beside->GetControlPointsCount());
+    for (int i = 0; i < late->GetControlPointsCount(); ++i)
+        expectNear(late->GetControlPointAt(i), beside->GetControlPointAt(i), 0.0);
+    ASSERT_TRUE(late->GetLayer(0) && late->GetLayer(0)->GetNormals() && late->GetLayer(0)->GetUVs());
+    EXPECT_EQ(late->GetLayer(0)->GetNormals()->GetDirectArray().GetCount(), late->GetPolygonVertexCount());
+}
+
+TEST_F(GeometryConverter, FreesASurfaceWhoseMeshWasNeverAskedFor) {
+    FbxMesh* mesh = converted(bilinear(3));
+    const std::size_t objects = manager->data().objects.size();
+
+    mesh->Destroy();
+
+    EXPECT_EQ(manager->data().objects.size(), objects - 2) << "the mesh and its surface";
+}
+
+TEST_F(GeometryConverter, LeavesASurfaceWithoutAFinitePlaceAsItIs) {
+    FbxPatch* patch = bilinear(3);
+    patch->SetControlPointAt(FbxVector4(std::numeric_limits<double>::infinity(), 0, 0), 1);
+
+    EXPECT_EQ(converted(patch), nullptr);
+
+    EXPECT_EQ(node->GetNodeAttribute(), patch);
+}
+
+TEST_F(GeometryConverter, MakesStepsCoarserOnceASceneHasSamplesEnough) {
+    int first = 0, last = 0;
+    std::int64_t all = 0;
+    for (int i = 0; i < 200; ++i) {
+        node = make<FbxNode>("node");
+        last = converted(bilinear(100))->GetControlPointsCount();
+        first = i == 0 ? last : first;
+        all += last;
+    }
+
+    EXPECT_EQ(first, 101 * 101);
+    EXPECT_GE(last, 15 * 15);
+    EXPECT_LE(last, 4 * detail::kSamplesPerControlPoint);
+    EXPECT_LE(all, detail::kSamplesOfAnyScene + 200 * 4 * detail::kSamplesPerControlPoint);
+    EXPECT_GT(converter.coarserSurfaces(), 100);
 }
 
 } // namespace
