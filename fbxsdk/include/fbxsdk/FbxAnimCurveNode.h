@@ -5,6 +5,7 @@
 #pragma once
 
 #include <string>
+#include <unordered_map>
 #include <vector>
 
 #include <fbxsdk/FbxObject.h>
@@ -53,6 +54,8 @@ public:
     void arrangeChannels(const std::vector<double>& pComponents);
     [[nodiscard]] double channelValue(unsigned int pChannelId) const;
     void setChannelValue(unsigned int pChannelId, double pValue);
+    /// In how many of the channels the curve stands.
+    [[nodiscard]] int usesOf(const FbxAnimCurve& pCurve) const;
 
 protected:
     void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
@@ -64,6 +67,9 @@ private:
         std::vector<FbxAnimCurve*> curves;
     };
     std::vector<Channel> mChannels;
+    /// Index by name, once there are many and until their order changes.
+    mutable std::unordered_map<std::string, int> mChannelIndex;
+    std::unordered_map<const FbxObject*, int> mUses; ///< of each curve, in how many channels it stands
 };
 
 FBXSDK_NAMESPACE_END

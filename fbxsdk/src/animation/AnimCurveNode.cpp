@@ -41,6 +41,9 @@ int channelCount(EFbxType type) {
     }
 }
 
+/// So many channels are searched one by one; more get an index.
+constexpr std::size_t kSearchedChannels = 8;
+
 /// Files call the curve nodes of the three transform properties by a letter.
 const char* curveNodeName(const char* propertyName) {
     constexpr struct {
@@ -80,6 +83,12 @@ unsigned int FbxAnimCurveNode::GetChannelsCount() const { return static_cast<uns
 int FbxAnimCurveNode::GetChannelIndex(const char* pChannelName) const {
     if (!pChannelName)
         return -1;
+    if (mChannels.size() > kSearchedChannels) {
+        for (std::size_t i = mChannelIndex.size(); i < mChannels.size(); ++i) // names are unique
+            mChannelIndex.emplace(mChannels[i].name, static_cast<int>(i));
+        const auto known = mChannelIndex.find(pChannelName);
+        return known == mChannelIndex.end() ? -1 : known->second;
+    }
     const auto found = std::find_if(mChannels.begin(), mChannels.end(),
                                     [&](const Channel& channel) { return channel.name == pChannelName; });
     return found == mChannels.end() ? -1 : static_cast<int>(found - mChannels.begin());
@@ -121,12 +130,12 @@ bool FbxAnimCurveNode::ConnectToChannel(FbxAnimCurve* pCurve, unsigned int pChan
     if (!pCurve || pChannelId >= mChannels.size())
         return false;
     auto& curves = mChannels[pChannelId].curves;
-    // The curves of all channels are the node's sources.
-    const bool isSource = IsConnectedSrcObject(pCurve);
-    if (isSource && std::find(curves.begin(), curves.end(), pCurve) != curves.end())
+    if (usesOf(*pCurve) > 0 && std::find(curves.begin(), curves.end(), pCurve) != curves.end())
         return false;
+    int& uses = mUses[pCurve];
     curves.insert(pInFront ? curves.begin() : curves.end(), pCurve);
-    if (!isSource)
+    ++uses;
+    if (!IsConnectedSrcObject(pCurve))
         ConnectSrcObject(pCurve);
     ++GetFbxManager()->data().revision;
     return true;
@@ -140,10 +149,7 @@ bool FbxAnimCurveNode::ConnectToChannel(FbxAnimCurve* pCurve, const char* pChann
 bool FbxAnimCurveNode::DisconnectFromChannel(FbxAnimCurve* pCurve, unsigned int pChannelId) {
     if (pChannelId >= mChannels.size() || std::erase(mChannels[pChannelId].curves, pCurve) == 0)
         return false;
-    const bool elsewhere = std::any_of(mChannels.begin(), mChannels.end(), [&](const Channel& channel) {
-        return std::find(channel.curves.begin(), channel.curves.end(), pCurve) != channel.curves.end();
-    });
-    if (!elsewhere)
+    if (--mUses[pCurve] == 0)
         DisconnectSrcObject(pCurve);
     ++GetFbxManager()->data().revision;
     return true;
@@ -195,7 +201,13 @@ void FbxAnimCurveNode::arrangeChannels(const std::vector<double>& pComponents) {
         if (found != mChannels.end())
             std::rotate(place, found, std::next(found));
     }
+    mChannelIndex.clear();
     ++GetFbxManager()->data().revision;
+}
+
+int FbxAnimCurveNode::usesOf(const FbxAnimCurve& pCurve) const {
+    const auto found = mUses.find(&pCurve);
+    return found == mUses.end() ? 0 : found->second;
 }
 
 double FbxAnimCurveNode::channelValue(unsigned int pChannelId) const {
@@ -215,6 +227,8 @@ void FbxAnimCurveNode::connectionChanged(FbxObject& pSource, FbxObject& pDestina
         return;
     // A curve that is cut off (or dies) must not linger in a channel. It may be past its own destructor's body, so
     // it is compared by address only.
+    if (mUses.erase(&pSource) == 0)
+        return;
     for (Channel& channel : mChannels) {
         std::erase_if(channel.curves,
                       [&](const FbxAnimCurve* curve) { return static_cast<const FbxObject*>(curve) == &pSource; });

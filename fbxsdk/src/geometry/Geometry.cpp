@@ -6,6 +6,8 @@
 
 #include <fbxsdk/FbxBlendShape.h>
 #include <fbxsdk/FbxBlendShapeChannel.h>
+#include <fbxsdk/FbxSkin.h>
+#include <fbxsdk/FbxVertexCacheDeformer.h>
 
 #include "geometry/GeometrySource.h"
 #include "geometry/SourceList.h"
@@ -26,6 +28,21 @@ T* withStatus(T* found, FbxStatus* status) {
     else
         status->SetCode(FbxStatus::eIndexOutOfRange);
     return found;
+}
+
+/// Null for what is no type.
+const FbxClassId* classOf(FbxDeformer::EDeformerType type) {
+    switch (type) {
+    case FbxDeformer::eSkin:
+        return &FbxSkin::ClassId;
+    case FbxDeformer::eBlendShape:
+        return &FbxBlendShape::ClassId;
+    case FbxDeformer::eVertexCache:
+        return &FbxVertexCacheDeformer::ClassId;
+    case FbxDeformer::eUnknown:
+        break;
+    }
+    return nullptr;
 }
 
 } // namespace
@@ -49,19 +66,17 @@ FbxDeformer* FbxGeometry::GetDeformer(int pIndex, FbxStatus* pStatus) const {
     return withStatus(detail::sourceAt(mDeformers, pIndex), pStatus);
 }
 
+// Deformers are the geometry's sources, which know those of a class.
+
 int FbxGeometry::GetDeformerCount(FbxDeformer::EDeformerType pType) const {
-    return static_cast<int>(std::count_if(mDeformers.begin(), mDeformers.end(), [pType](const FbxDeformer* deformer) {
-        return deformer->GetDeformerType() == pType;
-    }));
+    const FbxClassId* id = classOf(pType);
+    return id ? GetSrcObjectCount(FbxCriteria::ObjectType(*id)) : 0;
 }
 
 FbxDeformer* FbxGeometry::GetDeformer(int pIndex, FbxDeformer::EDeformerType pType, FbxStatus* pStatus) const {
-    int index = pIndex;
-    for (FbxDeformer* deformer : mDeformers) {
-        if (deformer->GetDeformerType() == pType && index-- == 0)
-            return withStatus(deformer, pStatus);
-    }
-    return withStatus<FbxDeformer>(nullptr, pStatus);
+    const FbxClassId* id = classOf(pType);
+    FbxObject* found = id ? GetSrcObject(FbxCriteria::ObjectType(*id), pIndex) : nullptr;
+    return withStatus(static_cast<FbxDeformer*>(found), pStatus);
 }
 
 int FbxGeometry::GetShapeCount() const {

@@ -22,10 +22,7 @@ bool isShared(const FbxAnimCurve& curve) {
     int uses = 0;
     for (const ConnectionPoint* point : curve.data().plug.destinations) {
         const auto* node = point->property < 0 ? FbxCast<FbxAnimCurveNode>(point->object) : nullptr;
-        for (unsigned int channel = 0; node && channel < node->GetChannelsCount(); ++channel) {
-            for (unsigned int id = 0; node->GetCurve(channel, id); ++id)
-                uses += node->GetCurve(channel, id) == &curve;
-        }
+        uses += node ? node->usesOf(curve) : 0;
         if (uses > 1)
             return true;
     }

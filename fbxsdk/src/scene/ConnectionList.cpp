@@ -2,10 +2,12 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // A selection reads the list once, and what is appended later when it is asked again; what is taken out of the middle
-// ends all selections.
+// ends all selections. The gaps that removals leave in a long list are closed when somebody looks at it.
 #include "scene/ConnectionList.h"
 
 #include <algorithm>
+#include <new>
+#include <unordered_map>
 
 #include "scene/ObjectData.h"
 
@@ -15,6 +17,8 @@ namespace {
 
 /// A list of so many connections is searched; longer ones keep selections.
 constexpr std::size_t kSearched = 16;
+/// So near to either end of a list a connection is searched before all places are noted.
+constexpr std::size_t kNear = 32;
 
 /// Properties for no criteria.
 bool isSelected(const ConnectionPoint& point, const FbxCriteria* criteria) {
@@ -37,29 +41,86 @@ struct ConnectionList::Selection {
     }
 };
 
+struct ConnectionList::Removal {
+    using Places = std::unordered_map<const ConnectionPoint*, std::size_t>;
+    Places places; ///< of those that are there
+};
+
 ConnectionList::ConnectionList() = default;
 ConnectionList::~ConnectionList() = default;
 
+std::size_t ConnectionList::size() const { return mRemoval ? mRemoval->places.size() : mPoints.size(); }
+
+void ConnectionList::append(ConnectionPoint& point) {
+    mPoints.push_back(&point);
+    if (!mRemoval)
+        return;
+    try {
+        mRemoval->places.emplace(&point, mPoints.size() - 1);
+    } catch (const std::bad_alloc&) {
+        endRemoval();
+    }
+}
+
 bool ConnectionList::contains(const ConnectionPoint& point) const {
+    if (mRemoval)
+        return mRemoval->places.contains(&point);
     return std::find(mPoints.begin(), mPoints.end(), &point) != mPoints.end();
 }
 
 bool ConnectionList::remove(const ConnectionPoint& point) {
-    // What was connected last is mostly cut first: search from the back.
-    const auto found = std::find(mPoints.rbegin(), mPoints.rend(), &point);
-    if (found == mPoints.rend())
+    const std::size_t index = placeOf(point);
+    if (index == mPoints.size())
         return false;
-    const auto place = std::next(found).base();
-    const auto index = static_cast<std::size_t>(place - mPoints.begin());
-    if (mSelections && std::any_of(mSelections->begin(), mSelections->end(),
-                                   [&](const Selection& selection) { return index < selection.seen; }))
+    const auto isSeen = [index](const Selection& selection) { return index < selection.seen; };
+    if (mSelections && std::any_of(mSelections->begin(), mSelections->end(), isSeen))
         mSelections.reset();
-    mPoints.erase(place);
+    if (mRemoval) {
+        mPoints[index] = nullptr;
+        mRemoval->places.erase(&point);
+    } else {
+        mPoints.erase(mPoints.begin() + static_cast<std::ptrdiff_t>(index));
+    }
     return true;
 }
 
+std::size_t ConnectionList::placeOf(const ConnectionPoint& point) {
+    const std::size_t count = mPoints.size();
+    for (std::size_t near = 0; !mRemoval && near < std::min(kNear, count); ++near) {
+        for (const std::size_t index : {count - 1 - near, near}) {
+            if (mPoints[index] == &point)
+                return index;
+        }
+    }
+    if (!mRemoval && count > kNear && !beginRemoval())
+        return static_cast<std::size_t>(std::find(mPoints.begin(), mPoints.end(), &point) - mPoints.begin());
+    if (!mRemoval)
+        return count;
+    const auto found = mRemoval->places.find(&point);
+    return found == mRemoval->places.end() ? count : found->second;
+}
+
+/// False when there is no memory for it: what is to be taken out goes all the same.
+bool ConnectionList::beginRemoval() {
+    try {
+        mRemoval = std::make_unique<Removal>();
+        for (std::size_t i = 0; i < mPoints.size(); ++i)
+            mRemoval->places.emplace(mPoints[i], i);
+        return true;
+    } catch (const std::bad_alloc&) {
+        mRemoval.reset();
+        return false;
+    }
+}
+
+void ConnectionList::endRemoval() const {
+    std::erase(mPoints, nullptr);
+    mRemoval.reset();
+    mSelections.reset(); // they counted the gaps
+}
+
 ConnectionList::Selection* ConnectionList::selectionOf(const FbxCriteria* criteria) const {
-    if (mPoints.size() <= kSearched || (criteria && criteria->isCombined()))
+    if (all().size() <= kSearched || (criteria && criteria->isCombined()))
         return nullptr;
     if (!mSelections)
         mSelections = std::make_unique<std::vector<Selection>>();

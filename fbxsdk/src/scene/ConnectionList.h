@@ -25,14 +25,18 @@ public:
     ConnectionList(const ConnectionList&) = delete;
     ConnectionList& operator=(const ConnectionList&) = delete;
 
-    [[nodiscard]] const std::vector<ConnectionPoint*>& all() const { return mPoints; }
-    [[nodiscard]] auto begin() const { return mPoints.begin(); }
-    [[nodiscard]] auto end() const { return mPoints.end(); }
-    [[nodiscard]] std::size_t size() const { return mPoints.size(); }
-    [[nodiscard]] bool empty() const { return mPoints.empty(); }
+    [[nodiscard]] const std::vector<ConnectionPoint*>& all() const {
+        if (mRemoval)
+            endRemoval();
+        return mPoints;
+    }
+    [[nodiscard]] auto begin() const { return all().begin(); }
+    [[nodiscard]] auto end() const { return all().end(); }
+    [[nodiscard]] std::size_t size() const;
+    [[nodiscard]] bool empty() const { return size() == 0; }
     [[nodiscard]] bool contains(const ConnectionPoint& point) const;
 
-    void append(ConnectionPoint& point) { mPoints.push_back(&point); }
+    void append(ConnectionPoint& point);
     /// False when it is not there.
     bool remove(const ConnectionPoint& point);
 
@@ -45,13 +49,22 @@ public:
 
 private:
     struct Selection;
+    struct Removal;
 
     // No criteria: the properties.
     [[nodiscard]] Selection* selectionOf(const FbxCriteria* criteria) const;
     [[nodiscard]] int count(const FbxCriteria* criteria) const;
     [[nodiscard]] ConnectionPoint* at(const FbxCriteria* criteria, int index) const;
 
-    std::vector<ConnectionPoint*> mPoints;
+    /// Their number for what is not there.
+    [[nodiscard]] std::size_t placeOf(const ConnectionPoint& point);
+    bool beginRemoval();
+    void endRemoval() const;
+
+    /// With gaps during a removal.
+    mutable std::vector<ConnectionPoint*> mPoints;
+    /// While one after the other is taken out of a long list, and nobody looks.
+    mutable std::unique_ptr<Removal> mRemoval;
     /// What was asked for; they follow the list when they are asked again.
     mutable std::unique_ptr<std::vector<Selection>> mSelections;
 };
