@@ -584,7 +584,7 @@ TEST_F(GeometryConverter, MakesStepsCoarserOnceASceneHasSamplesEnough) {
     }
 
     EXPECT_EQ(first, 101 * 101);
-    EXPECT_GE(last, 15 * 15);
+    EXPECT_GE(last, 13 * 13);
     EXPECT_LE(last, 4 * detail::kSamplesPerControlPoint);
     EXPECT_LE(all, detail::kSamplesOfAnyScene + 200 * 4 * detail::kSamplesPerControlPoint);
     EXPECT_GT(converter.coarserSurfaces(), 100);
