@@ -192,8 +192,8 @@ bool Scene::moves(fbxsdk::FbxNode& node) {
         moving = isKeyed(at->LclTranslation) || isKeyed(at->LclRotation) || isKeyed(at->LclScaling);
     }
     // Of those above a node that moves only that node itself is known to.
-    for (std::size_t i = 0; i < above.size(); ++i) {
-        mMoves[above[i]] = moving;
+    for (const fbxsdk::FbxNode* each : above) {
+        mMoves[each] = moving;
     }
     return moving;
 }

@@ -8,6 +8,7 @@
 #include "TnFbxChannel.h"
 
 #include "FrameArithmetic.h"
+#include "SameBits.h"
 
 #include <cmath>
 #include <cstddef>
@@ -50,8 +51,6 @@ bool areSamples(const TnFbxTime& time, std::size_t valueCount) {
 bool areAllEqual(const std::vector<float>& values) {
     return values.size() < 2 || std::memcmp(values.data(), values.data() + 1, (values.size() - 1) * sizeof(float)) == 0;
 }
-
-bool areEqual(float a, float b) { return std::memcmp(&a, &b, sizeof a) == 0; }
 
 } // namespace
 
@@ -97,7 +96,7 @@ float TnFbxChannel::getValue() const { return mValue; }
 bool TnFbxChannel::setValueAt(float frame, float value) {
     const int wholeFrame = detail::truncateToInt(frame);
     const bool isCovered = mCount > 0 && wholeFrame >= mTime.getStartFrame() && wholeFrame <= mTime.getEndFrame();
-    if (isCovered && areEqual(sampleAt(indexOf(wholeFrame)), value)) {
+    if (isCovered && detail::haveSameBits(sampleAt(indexOf(wholeFrame)), value)) {
         mAnimated = true;
         return true;
     }

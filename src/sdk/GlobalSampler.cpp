@@ -6,6 +6,7 @@
 
 #include "NodeGeometry.h"
 #include "PropertySampling.h"
+#include "model/SameBits.h"
 
 #include <algorithm>
 #include <cstring>
@@ -55,7 +56,9 @@ public:
         // kept: which decomposition is used hangs on an exactly zero translation; they differ near gimbal lock
         const bool atOrigin = t[0] == 0.0 && t[1] == 0.0 && t[2] == 0.0;
         const auto* elements = static_cast<const double*>(matrix);
-        if (!mHasLast || atOrigin != mAtOrigin || std::memcmp(elements, mAxes.data(), sizeof mAxes) != 0) {
+        const bool isTurned = !std::equal(mAxes.begin(), mAxes.end(), elements,
+                                          [](double a, double b) { return detail::haveSameBits(a, b); });
+        if (!mHasLast || atOrigin != mAtOrigin || isTurned) {
             std::memcpy(mAxes.data(), elements, sizeof mAxes);
             mAtOrigin = atOrigin;
             mHasLast = true;

@@ -6,9 +6,9 @@
 
 #include "TnFbxChannel.h"
 #include "TnFbxTime.h"
+#include "model/SameBits.h"
 
 #include <cstddef>
-#include <cstring>
 #include <utility>
 #include <vector>
 
@@ -25,9 +25,7 @@ public:
     }
 
     /// Whether adding the value ends that all samples are one: from then on each takes memory.
-    bool spreadsWith(float value) const {
-        return mValues.empty() && mCount > 0 && std::memcmp(&value, &mFirst, sizeof value) != 0;
-    }
+    bool spreadsWith(float value) const { return mValues.empty() && mCount > 0 && !haveSameBits(value, mFirst); }
 
     void add(float value) {
         if (mCount == 0) {

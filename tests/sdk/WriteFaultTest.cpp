@@ -246,7 +246,7 @@ template <class Action>
 Outcome outcomeWithoutMemory(long first, long count, const Action& action) {
     gHasQuietlyFailed = false;
     gAllocations = 0;
-    gFirstWorkingAgain = count == kNever ? kNever : first + count;
+    gFirstWorkingAgain = first > kNever - count ? kNever : first + count;
     gFirstFailing = first;
     Outcome outcome = Outcome::eThrown;
     try {

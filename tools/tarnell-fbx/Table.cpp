@@ -32,7 +32,12 @@ void Table::print(std::ostream& out, const Terminal& terminal, std::size_t inden
             const bool toTheRight = mColumns[i].align == Align::right;
             // Blanks are held back until something follows them.
             line += text.empty() ? "" : blanks + (toTheRight ? padding : "");
-            blanks = text.empty() ? blanks + padding : (toTheRight ? "" : padding);
+            if (!text.empty()) {
+                blanks.clear();
+            }
+            if (text.empty() || !toTheRight) {
+                blanks += padding;
+            }
             line += terminal.paint(isTitle ? Ink::faint : mColumns[i].ink, text);
             blanks += "  ";
             taken += width[i] + 2;
