@@ -1,5 +1,5 @@
-# One object library per layer of the platform, so that a layer can be built and tested alone; one test
-# executable per folder of tests.
+# One object library per room of the platform, so that a room can be built and tested alone; one test executable per
+# folder of tests.
 
 # tarnell_precompile(TARGET header...)
 function(tarnell_precompile name)
@@ -19,22 +19,30 @@ function(tarnell_precompile_standard_headers name)
   endif()
 endfunction()
 
-# tarnell_layer(NAME [DEPENDS layer...]): every source of this folder's subfolder NAME.
-function(tarnell_layer name)
-  cmake_parse_arguments(ARG "" "" "DEPENDS" ${ARGN})
-  file(GLOB sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/src/${name}/*.cpp")
-  if(NOT sources)
-    return()
-  endif()
+# tarnell_room(NAME [NEEDS room...] [LIBRARIES library...]): every source below src/NAME. A room may use those it needs,
+# and those that these need. `fbxsdk_up_to_NAME` is all of them, with the internals visible: what the room's tests link.
+function(tarnell_room name)
+  cmake_parse_arguments(ARG "" "" "NEEDS;LIBRARIES" ${ARGN})
+  file(GLOB_RECURSE sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/src/${name}/*.cpp")
   add_library(fbxsdk_${name} OBJECT ${sources})
-  target_link_libraries(fbxsdk_${name} PUBLIC tarnell_settings)
+  target_link_libraries(fbxsdk_${name} PUBLIC tarnell_settings ${ARG_LIBRARIES})
   target_include_directories(fbxsdk_${name} PUBLIC
     "${PROJECT_SOURCE_DIR}/fbxsdk/include" "${PROJECT_SOURCE_DIR}/fbxsdk/src")
   target_compile_definitions(fbxsdk_${name} PRIVATE FBXSDK_BUILDING)
-  if(ARG_DEPENDS)
-    target_link_libraries(fbxsdk_${name} PUBLIC ${ARG_DEPENDS})
-  endif()
   tarnell_precompile_standard_headers(fbxsdk_${name})
+
+  set(rooms ${name})
+  foreach(need IN LISTS ARG_NEEDS)
+    get_property(below GLOBAL PROPERTY fbxsdk_up_to_${need})
+    list(APPEND rooms ${below})
+  endforeach()
+  list(REMOVE_DUPLICATES rooms)
+  set_property(GLOBAL PROPERTY fbxsdk_up_to_${name} ${rooms})
+  add_library(fbxsdk_up_to_${name} INTERFACE)
+  foreach(room IN LISTS rooms)
+    target_link_libraries(fbxsdk_up_to_${name} INTERFACE fbxsdk_${room} $<TARGET_OBJECTS:fbxsdk_${room}>)
+  endforeach()
+  set_property(GLOBAL APPEND PROPERTY fbxsdk_rooms ${name})
 endfunction()
 
 # To read GoogleTest takes longer than to compile most tests: an empty program reads it for all.
@@ -50,13 +58,13 @@ function(tarnell_precompile_test_headers name)
   target_precompile_headers(${name} REUSE_FROM test_headers)
 endfunction()
 
-# tarnell_test(NAME FOLDER folder LINK target...): every *Test.cpp of the folder becomes one executable.
+# tarnell_test(NAME FOLDER folder LINK target...): every *Test.cpp below the folder becomes one executable.
 # tarnell_test(NAME SOURCES file... LINK target...): these files do.
 function(tarnell_test name)
   cmake_parse_arguments(ARG "" "FOLDER" "LINK;SOURCES" ${ARGN})
   set(sources ${ARG_SOURCES})
   if(ARG_FOLDER)
-    file(GLOB sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/${ARG_FOLDER}/*Test.cpp")
+    file(GLOB_RECURSE sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/${ARG_FOLDER}/*Test.cpp")
   endif()
   if(NOT sources)
     return()

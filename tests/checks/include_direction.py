@@ -18,7 +18,7 @@ INCLUDE = re.compile(r'^[ \t]*#[ \t]*include[ \t]*([<"][^>"]+[>"])', re.MULTILIN
 
 # What belongs to the platform: its umbrella, its public folder, and its internals by layer.
 PLATFORM = re.compile(
-    r'^[<"](?:.*/)?(?:fbxsdk\.h|fbxsdk/.*|(?:core|container|document|scene|animation|geometry|cache)/.*)[>"]$'
+    r'^[<"](?:.*/)?(?:fbxsdk\.h|fbxsdk/.*|(?:core|container|schema|document|object|animation|scene|cache|geometry|conversion|io)/.*)[>"]$'
 )
 # What belongs to the library: its public headers and its own folders.
 LIBRARY = re.compile(r'^[<"](?:.*/)?(?:Tn\w+\.h|Fbx\.h|FbxSdk\.h|(?:model|access|sdk|faithful)/.*)[>"]$')

@@ -14,7 +14,7 @@
 
 #include "container/Record.h"
 #include "document/Document.h"
-#include "scene/SceneReading.h"
+#include "io/SceneReading.h"
 
 namespace {
 

@@ -12,8 +12,8 @@
 #include <fbxsdk/FbxScene.h>
 
 #include "animation/PropertyEvaluation.h"
-#include "scene/PropertyConversion.h"
-#include "scene/SceneMembers.h"
+#include "object/PropertyConversion.h"
+#include "object/SceneMembers.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace {

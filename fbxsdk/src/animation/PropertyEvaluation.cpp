@@ -15,7 +15,7 @@
 #include <fbxsdk/FbxAnimStack.h>
 
 #include "core/Rotation.h"
-#include "scene/SceneMembers.h"
+#include "object/SceneMembers.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

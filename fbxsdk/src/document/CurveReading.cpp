@@ -7,7 +7,7 @@
 #include <numeric>
 
 #include "document/FileTicks.h"
-#include "document/LegacyKeys.h"
+#include "document/legacy/LegacyKeys.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

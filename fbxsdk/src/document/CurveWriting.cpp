@@ -8,8 +8,8 @@
 #include <bit>
 #include <cmath>
 
-#include "document/LegacyKeys.h"
 #include "document/RecordWriting.h"
+#include "document/legacy/LegacyKeys.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

@@ -3,7 +3,7 @@
 //
 // Which generation is written, and what becomes of parts that it keeps elsewhere.
 #include "document/DocumentSections.h"
-#include "document/InlineShapeWriting.h"
+#include "document/legacy/InlineShapeWriting.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

@@ -4,7 +4,7 @@
 // What files say of objects beyond what they are.
 #include <fbxsdk/extensions/FileFacts.h>
 
-#include "scene/ObjectData.h"
+#include "object/ObjectData.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace extensions {

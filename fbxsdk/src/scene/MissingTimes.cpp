@@ -15,7 +15,7 @@
 
 #include "animation/CurveEvaluation.h"
 #include "animation/FrameRateOfTimes.h"
-#include "scene/SceneMembers.h"
+#include "object/SceneMembers.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

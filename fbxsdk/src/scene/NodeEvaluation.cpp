@@ -18,7 +18,7 @@
 
 #include "animation/PropertyEvaluation.h"
 #include "core/Rotation.h"
-#include "scene/ManagerData.h"
+#include "object/ManagerData.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

@@ -7,8 +7,8 @@
 
 #include <fbxsdk/FbxNode.h>
 
-#include "scene/ObjectData.h"
-#include "scene/Schema.h"
+#include "object/ObjectData.h"
+#include "schema/Schema.h"
 
 FBXSDK_NAMESPACE_BEGIN
 

@@ -11,7 +11,7 @@
 #include <fbxsdk/FbxScene.h>
 
 #include "document/Document.h"
-#include "scene/ObjectData.h"
+#include "object/ObjectData.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

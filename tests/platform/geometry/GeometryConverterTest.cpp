@@ -24,8 +24,8 @@
 
 #include "GeometryFixture.h"
 #include "NurbsSamples.h"
-#include "geometry/TessellationGrid.h"
-#include "scene/ManagerData.h"
+#include "geometry/tessellation/TessellationGrid.h"
+#include "object/ManagerData.h"
 
 namespace fbxsdk {
 namespace {

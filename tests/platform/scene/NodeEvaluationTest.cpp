@@ -13,10 +13,10 @@
 #include <fbxsdk/FbxNode.h>
 
 #include "Animate.h"
-#include "PlainMatrix.h"
 #include "SceneFixture.h"
 #include "SeededRandom.h"
-#include "scene/ManagerData.h"
+#include "object/ManagerData.h"
+#include "platform/conversion/PlainMatrix.h"
 #include "scene/NodeEvaluation.h"
 
 namespace {

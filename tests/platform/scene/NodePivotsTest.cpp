@@ -9,7 +9,7 @@
 #include <fbxsdk/FbxNode.h>
 
 #include "SceneFixture.h"
-#include "scene/ObjectData.h"
+#include "object/ObjectData.h"
 
 namespace {
 

@@ -15,7 +15,7 @@
 #include <fbxsdk/FbxSurfaceMaterial.h>
 
 #include "SceneFixture.h"
-#include "scene/ShadingLetters.h"
+#include "schema/ShadingLetters.h"
 
 namespace {
 

@@ -1,0 +1,26 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// All three matrices of a cluster change together: in the skinning formula they meet as inverse(link) times mesh, where
+// the common factor cancels.
+#include "conversion/ClusterBinding.h"
+
+#include <fbxsdk/FbxCluster.h>
+#include <fbxsdk/FbxScene.h>
+
+#include "object/SceneMembers.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+void transformBindMatrices(FbxScene& scene, const FbxAMatrix& transform) {
+    for (FbxCluster* cluster : sourcesOf<FbxCluster>(scene)) {
+        FbxAMatrix matrix;
+        cluster->SetTransformMatrix(transform * cluster->GetTransformMatrix(matrix));
+        cluster->SetTransformLinkMatrix(transform * cluster->GetTransformLinkMatrix(matrix));
+        cluster->SetTransformAssociateModelMatrix(transform * cluster->GetTransformAssociateModelMatrix(matrix));
+    }
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,336 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Files of version 6.1: objects are known by name and list all their properties, a Model holds its attribute, and the
+// animation stands in takes. The mirror of Generation6.
+#include <algorithm>
+
+#include "document/DocumentSections.h"
+#include "document/PropertyWriting.h"
+#include "document/RecordWriting.h"
+#include "document/legacy/LegacyLayout.h"
+#include "document/legacy/TakeWriting.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+/// Settings that this generation does not have.
+constexpr std::string_view kNewerSettings[] = {"TimeMarker", "CurrentTimeMarker"};
+
+/// Properties of objects that this generation does not have, and the value that goes without saying.
+constexpr struct {
+    std::string_view name;
+    double value;
+} kNewerProperties[] = {{"Visibility Inheritance", 1}, {"AreaLightShape", 0}, {"LeftBarnDoor", 20},
+                        {"RightBarnDoor", 20},         {"TopBarnDoor", 20},   {"BottomBarnDoor", 20},
+                        {"EnableBarnDoor", 0}};
+
+bool goesWithoutSaying(const DocumentProperty& property) {
+    return property.values.size() == 1 &&
+           std::any_of(std::begin(kNewerProperties), std::end(kNewerProperties), [&](const auto& row) {
+               return row.name == property.name && row.value == property.values.front().toReal();
+           });
+}
+
+/// The order of kinds within Objects, and that of their counts; others follow.
+constexpr std::string_view kObjectOrder[] = {"Model",    "NodeAttribute", "Geometry", "SceneInfo", "Material",
+                                             "Deformer", "Video",         "Texture",  "Cache"};
+constexpr std::string_view kCountOrder[] = {"Model",          "Material",      "Texture",  "Video", "SceneInfo",
+                                            "GlobalSettings", "NodeAttribute", "Geometry", "Cache", "Deformer"};
+
+template <std::size_t size>
+std::size_t rankIn(const std::string_view (&order)[size], std::string_view record) {
+    return static_cast<std::size_t>(std::find(std::begin(order), std::end(order), record) - std::begin(order));
+}
+
+struct Rate {
+    std::int64_t timeMode;
+    std::string_view framesPerSecond;
+};
+/// The second way in which files state the frame rate; by time mode.
+constexpr Rate kRates[] = {{0, "30"},    {1, "120"},     {2, "100"},   {3, "60"},    {4, "50"},    {5, "48"},
+                           {6, "30"},    {7, "30"},      {8, "29.97"}, {9, "29.97"}, {10, "25"},   {11, "24"},
+                           {12, "1000"}, {13, "23.976"}, {15, "96"},   {16, "72"},   {17, "59.94"}};
+
+class Generation6Writer {
+public:
+    Generation6Writer(const WritableDocument& document, const VersionTraits& traits, RecordSink& sink)
+        : mDocument(document), mTraits(traits), mSink(sink), mLayout(document) {}
+
+    void write() {
+        writeHeader(mDocument, mTraits, mSink);
+        writeDocumentSection();
+        writeDefinitions();
+        writeObjects();
+        writeConnections();
+        writeLegacyTakes(mLayout, mTraits, mSink);
+        writeSettings();
+    }
+
+private:
+    void writeDocumentSection() {
+        mSink.heading("Document Description");
+        {
+            const BlockScope block(mSink, "Document");
+            writeText(mSink, "Name", "");
+        }
+        mSink.heading("Document References");
+        const BlockScope block(mSink, "References");
+    }
+
+    void writeDefinitions() {
+        std::vector<ObjectCount> kinds;
+        for (const WritableObject& object : mDocument.objects) {
+            if (mLayout.standsAlone(object))
+                count(kinds, object.record);
+        }
+        count(kinds, "SceneInfo");
+        count(kinds, "GlobalSettings");
+        std::stable_sort(kinds.begin(), kinds.end(), [](const ObjectCount& a, const ObjectCount& b) {
+            return rankIn(kCountOrder, a.record) < rankIn(kCountOrder, b.record);
+        });
+        std::int32_t total = 0;
+        for (const ObjectCount& kind : kinds)
+            total += kind.count;
+
+        mSink.heading("Object definitions");
+        const BlockScope block(mSink, "Definitions");
+        writeInteger(mSink, "Version", 100);
+        writeInteger(mSink, "Count", total);
+        for (const ObjectCount& kind : kinds) {
+            const BlockScope type(mSink, "ObjectType", kind.record);
+            writeInteger(mSink, "Count", kind.count);
+        }
+    }
+
+    static void count(std::vector<ObjectCount>& kinds, std::string_view record) {
+        const auto found =
+            std::find_if(kinds.begin(), kinds.end(), [&](const ObjectCount& kind) { return kind.record == record; });
+        if (found == kinds.end())
+            kinds.push_back({record, 1, nullptr});
+        else
+            ++found->count;
+    }
+
+    void writeObjects() {
+        mSink.heading("Object properties");
+        const BlockScope block(mSink, "Objects");
+        const std::vector<const WritableObject*> objects = objectsInOrder();
+        const auto behindSceneInfo = std::find_if(objects.begin(), objects.end(), [](const WritableObject* object) {
+            return rankIn(kObjectOrder, object->record) > rankIn(kObjectOrder, "SceneInfo");
+        });
+        std::for_each(objects.begin(), behindSceneInfo, [this](const WritableObject* object) { writeObject(*object); });
+        writeSceneInfo(mDocument, mTraits, mSink);
+        std::for_each(behindSceneInfo, objects.end(), [this](const WritableObject* object) { writeObject(*object); });
+        writeGlobalSettings();
+    }
+
+    [[nodiscard]] std::vector<const WritableObject*> objectsInOrder() const {
+        std::vector<const WritableObject*> objects;
+        for (const WritableObject& object : mDocument.objects) {
+            if (mLayout.standsAlone(object))
+                objects.push_back(&object);
+        }
+        std::stable_sort(objects.begin(), objects.end(), [](const WritableObject* a, const WritableObject* b) {
+            return rankIn(kObjectOrder, a->record) < rankIn(kObjectOrder, b->record);
+        });
+        return objects;
+    }
+
+    void writeObject(const WritableObject& object) {
+        if (mSink.failed())
+            return;
+        const WritableObject* attribute = mLayout.attributeOf(object.id);
+        writeFullName(object.record, object.id);
+        mSink.text(object.subClass);
+        mSink.beginBlock();
+        if (object.before)
+            object.before(mSink, mTraits);
+        writeProperties(object, attribute);
+        // An attribute by itself says what it is by its subclass, and has no further records.
+        if (object.after && object.record != "NodeAttribute")
+            object.after(mSink, mTraits);
+        if (attribute)
+            writeAttribute(*attribute);
+        else if (object.record == "NodeAttribute" || object.record == "Geometry")
+            writeAttributeName(object.id);
+        mSink.endRecord();
+    }
+
+    void writeAttribute(const WritableObject& attribute) {
+        if (attribute.before)
+            attribute.before(mSink, mTraits);
+        if (attribute.after)
+            attribute.after(mSink, mTraits);
+        writeAttributeName(attribute.id);
+    }
+
+    void writeAttributeName(std::int64_t attribute) {
+        writeFullName("NodeAttributeName", attribute);
+        mSink.endRecord();
+    }
+
+    /// Begins a record whose first value is an object's name.
+    void writeFullName(std::string_view record, std::int64_t id) {
+        const LegacyName& name = mLayout.nameOf(id);
+        mSink.beginRecord(record);
+        mSink.objectName(name.nameClass, name.name);
+    }
+
+    /// The attribute's properties stand behind the Model's own, with a letter that says so.
+    void writeProperties(const WritableObject& object, const WritableObject* attribute) {
+        const BlockScope block(mSink, "Properties60");
+        for (const DocumentProperty& property : object.properties)
+            writeProperty(property, object.subClass, property.flags);
+        if (attribute)
+            writeAttributeProperties(*attribute);
+    }
+
+    /// Those that have other names here stand last.
+    void writeAttributeProperties(const WritableObject& attribute) {
+        std::vector<const DocumentProperty*> renamed;
+        for (const DocumentProperty& property : attribute.properties) {
+            if (legacyPropertyName(attribute.subClass, property.name) != property.name)
+                renamed.push_back(&property);
+            else
+                writeProperty(property, attribute.subClass, std::string(property.flags) + 'N');
+        }
+        for (const DocumentProperty* property : renamed)
+            writeProperty(*property, attribute.subClass, std::string(property->flags) + 'N');
+    }
+
+    void writeProperty(DocumentProperty property, std::string_view subClass, std::string_view flags) {
+        if (goesWithoutSaying(property))
+            return;
+        property.name = legacyPropertyName(subClass, property.name);
+        writeProperty60(mSink, property, flags);
+    }
+
+    void writeGlobalSettings() {
+        const BlockScope block(mSink, "GlobalSettings");
+        writeInteger(mSink, "Version", 1000);
+        const BlockScope properties(mSink, "Properties60");
+        for (const DocumentProperty& property : mDocument.globalSettings) {
+            if (std::find(std::begin(kNewerSettings), std::end(kNewerSettings), property.name) ==
+                std::end(kNewerSettings))
+                writeProperty60(mSink, property, property.flags);
+        }
+    }
+
+    void writeConnections() {
+        mSink.heading("Object connections");
+        const BlockScope block(mSink, "Connections");
+        for (const DocumentConnection& connection : mDocument.connections)
+            writeConnection(connection);
+    }
+
+    [[nodiscard]] bool isConnectable(std::int64_t id) const {
+        const WritableObject* object = mLayout.find(id);
+        return id == 0 || (object && (mLayout.standsAlone(*object) || !mLayout.holdersOf(id).empty()));
+    }
+
+    void writeConnection(const DocumentConnection& connection) {
+        if (!isConnectable(connection.source) || !isConnectable(connection.destination))
+            return;
+        const bool betweenObjects = connection.sourceProperty.empty() && connection.destinationProperty.empty();
+        // The attribute stands inside.
+        const WritableObject* held = mLayout.attributeOf(connection.destination);
+        if (betweenObjects && held && held->id == connection.source)
+            return;
+        const std::vector<std::int64_t>& holders = mLayout.holdersOf(connection.destination);
+        if (!betweenObjects || holders.empty()) {
+            writeEnds(connection, connection.destination);
+            return;
+        }
+        // What deforms an attribute deforms the Models that hold it.
+        for (const std::int64_t holder : holders)
+            writeEnds(connection, holder);
+    }
+
+    void writeEnds(const DocumentConnection& connection, std::int64_t destination) {
+        const bool fromProperty = !connection.sourceProperty.empty();
+        const bool toProperty = !connection.destinationProperty.empty();
+        const LegacyName& from = mLayout.nameOf(connection.source);
+        const LegacyName& to = mLayout.nameOf(destination);
+        mSink.beginRecord("Connect");
+        mSink.text(fromProperty ? (toProperty ? "PP" : "PO") : (toProperty ? "OP" : "OO"));
+        mSink.objectName(from.nameClass, from.name);
+        if (fromProperty)
+            mSink.text(connection.sourceProperty);
+        mSink.objectName(to.nameClass, to.name);
+        if (toProperty)
+            mSink.text(connection.destinationProperty);
+        mSink.endRecord();
+    }
+
+    void writeSettings() {
+        mSink.heading("Version 5 settings");
+        const BlockScope block(mSink, "Version5");
+        writeAmbient();
+        writeFog();
+        writeTimeSettings();
+        const BlockScope renderer(mSink, "RendererSetting");
+        writeText(mSink, "DefaultCamera", setting("DefaultCamera").toText());
+        writeInteger(mSink, "DefaultViewingMode", 0);
+    }
+
+    void writeAmbient() {
+        const BlockScope block(mSink, "AmbientRenderSettings");
+        writeInteger(mSink, "Version", 101);
+        writeColor("AmbientLightColor", mDocument.lightSettings.ambientColor);
+    }
+
+    void writeFog() {
+        const DocumentLightSettings& settings = mDocument.lightSettings;
+        const BlockScope block(mSink, "FogOptions");
+        writeInteger(mSink, "FlogEnable", settings.fogEnable ? 1 : 0); // kept: the applications spell it so
+        writeInteger(mSink, "FogMode", settings.fogMode);
+        writeReal(mSink, "FogDensity", settings.fogDensity);
+        writeReal(mSink, "FogStart", settings.fogStart);
+        writeReal(mSink, "FogEnd", settings.fogEnd);
+        writeColor("FogColor", settings.fogColor);
+    }
+
+    void writeColor(std::string_view name, const double (&color)[4]) {
+        writeReals(mSink, name, {color[0], color[1], color[2], color[3]});
+    }
+
+    void writeTimeSettings() {
+        const BlockScope block(mSink, "Settings");
+        writeText(mSink, "FrameRate", frameRate());
+        writeInteger(mSink, "TimeFormat", 1);
+        writeInteger(mSink, "SnapOnFrames", 0);
+        writeInteger(mSink, "ReferenceTimeIndex", -1);
+        writeLong(mSink, "TimeLineStartTime", setting("TimeSpanStart").toInteger());
+        writeLong(mSink, "TimeLineStopTime", setting("TimeSpanStop").toInteger());
+    }
+
+    [[nodiscard]] std::string frameRate() const {
+        const std::int64_t mode = setting("TimeMode").toInteger();
+        for (const Rate& rate : kRates) {
+            if (rate.timeMode == mode)
+                return std::string(rate.framesPerSecond);
+        }
+        return std::to_string(setting("CustomFrameRate").toReal());
+    }
+
+    [[nodiscard]] Value setting(std::string_view name) const {
+        const DocumentProperty* property = findProperty(mDocument.globalSettings, name);
+        return property && !property->values.empty() ? property->values.front() : Value();
+    }
+
+    const WritableDocument& mDocument;
+    const VersionTraits& mTraits;
+    RecordSink& mSink;
+    LegacyLayout mLayout;
+};
+
+} // namespace
+
+void writeGeneration6(const WritableDocument& document, const VersionTraits& traits, RecordSink& sink) {
+    Generation6Writer(document, traits, sink).write();
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

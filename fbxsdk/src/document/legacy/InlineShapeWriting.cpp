@@ -1,0 +1,185 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// From a chain of deformers to Shape records inside a geometry.
+#include "document/legacy/InlineShapeWriting.h"
+
+#include <algorithm>
+#include <set>
+#include <string>
+#include <unordered_map>
+#include <unordered_set>
+#include <utility>
+
+#include "document/DocumentSections.h"
+#include "document/legacy/InlineShapes.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+constexpr std::string_view kPrefix = "d|";
+
+bool isKind(const WritableObject& object, std::string_view record, std::string_view subClass) {
+    return object.record == record && object.subClass == subClass;
+}
+
+/// A Shape record: its name and what writes its content.
+struct ShapeRecord {
+    std::string_view name;
+    WriteRecords content;
+};
+
+class ShapeMover {
+public:
+    explicit ShapeMover(WritableDocument& document) : mDocument(document) {
+        for (std::size_t i = 0; i < document.objects.size(); ++i)
+            mIndex.emplace(document.objects[i].id, i);
+        for (const DocumentConnection& connection : document.connections) {
+            if (connection.sourceProperty.empty() && connection.destinationProperty.empty())
+                mSources[connection.destination].push_back(connection.source);
+        }
+    }
+
+    void move() {
+        for (WritableObject& object : mDocument.objects) {
+            if (object.record == "Geometry" && object.subClass != "Shape")
+                moveInto(object);
+        }
+        if (mRemoved.empty())
+            return;
+        moveAnimation();
+        removeMoved();
+    }
+
+private:
+    struct Weight {
+        std::int64_t geometry = 0;
+        std::string_view name;
+    };
+
+    [[nodiscard]] WritableObject* find(std::int64_t id) {
+        const auto found = mIndex.find(id);
+        return found == mIndex.end() ? nullptr : &mDocument.objects[found->second];
+    }
+    [[nodiscard]] std::vector<WritableObject*> sourcesOf(std::int64_t id, std::string_view record,
+                                                         std::string_view subClass) {
+        std::vector<WritableObject*> sources;
+        for (const std::int64_t source : mSources[id]) {
+            WritableObject* object = find(source);
+            if (object && isKind(*object, record, subClass))
+                sources.push_back(object);
+        }
+        return sources;
+    }
+
+    void moveInto(WritableObject& geometry) {
+        std::vector<ShapeRecord> shapes;
+        std::set<std::string, std::less<>> names;
+        for (const DocumentProperty& property : geometry.properties)
+            names.emplace(property.name);
+        for (const WritableObject* blendShape : sourcesOf(geometry.id, "Deformer", "BlendShape")) {
+            mRemoved.insert(blendShape->id);
+            for (const WritableObject* channel : sourcesOf(blendShape->id, "Deformer", "BlendShapeChannel"))
+                moveChannel(geometry, *channel, names, shapes);
+        }
+        if (!shapes.empty())
+            appendShapes(geometry, std::move(shapes));
+    }
+
+    void moveChannel(WritableObject& geometry, const WritableObject& channel, std::set<std::string, std::less<>>& names,
+                     std::vector<ShapeRecord>& shapes) {
+        mRemoved.insert(channel.id);
+        const std::vector<WritableObject*> targets = sourcesOf(channel.id, "Geometry", "Shape");
+        for (const WritableObject* target : targets)
+            mRemoved.insert(target->id);
+        if (targets.empty())
+            return;
+        const std::string_view wanted = !targets.back()->name.empty() ? targets.back()->name : channel.name;
+        const std::string_view name = mDocument.texts.keepText(uniqueName(wanted, names));
+        shapes.push_back({name, targets.back()->after});
+        addWeight(geometry, channel, name);
+        mWeights.emplace(channel.id, Weight{geometry.id, name});
+    }
+
+    static std::string uniqueName(std::string_view wanted, std::set<std::string, std::less<>>& names) {
+        const std::string base(wanted.empty() ? "Shape" : wanted);
+        std::string name = base;
+        for (int i = 2; !names.insert(name).second; ++i)
+            name = base + '_' + std::to_string(i);
+        return name;
+    }
+
+    void addWeight(WritableObject& geometry, const WritableObject& channel, std::string_view name) {
+        const DocumentProperty* percent = findProperty(channel.properties, kDeformPercent);
+        DocumentProperty weight{name, "Number", "", "A", {}};
+        if (percent) {
+            weight.flags = percent->flags;
+            weight.values = percent->values;
+        } else {
+            weight.values = mDocument.keep({Value::ofReal(0)});
+        }
+        geometry.properties.push_back(weight);
+    }
+
+    static void appendShapes(WritableObject& geometry, std::vector<ShapeRecord> shapes) {
+        geometry.after = [before = std::move(geometry.after), shapes = std::move(shapes)](RecordSink& sink,
+                                                                                          const VersionTraits& traits) {
+            before(sink, traits);
+            for (const ShapeRecord& shape : shapes) {
+                sink.beginRecord("Shape");
+                sink.text(shape.name);
+                sink.beginBlock();
+                shape.content(sink, traits);
+                sink.endRecord();
+            }
+        };
+    }
+
+    /// The curve node of a weight drives the geometry's property now, and is named after it.
+    void moveAnimation() {
+        std::unordered_map<std::int64_t, std::string_view> nodes; ///< the component's new name
+        for (DocumentConnection& connection : mDocument.connections) {
+            const auto weight = mWeights.find(connection.destination);
+            if (weight == mWeights.end() || connection.destinationProperty != kDeformPercent)
+                continue;
+            connection.destination = weight->second.geometry;
+            connection.destinationProperty = weight->second.name;
+            renameNode(connection.source, weight->second.name, nodes);
+        }
+        for (DocumentConnection& connection : mDocument.connections) {
+            const auto node = nodes.find(connection.destination);
+            if (node != nodes.end() && connection.destinationProperty.starts_with(kPrefix))
+                connection.destinationProperty = node->second;
+        }
+    }
+
+    void renameNode(std::int64_t id, std::string_view name, std::unordered_map<std::int64_t, std::string_view>& nodes) {
+        WritableObject* node = find(id);
+        if (!node || node->record != "AnimationCurveNode" || node->properties.size() != 1)
+            return;
+        node->name = name;
+        node->properties.front().name = mDocument.texts.keepText(std::string(kPrefix) + std::string(name));
+        nodes.emplace(id, node->properties.front().name);
+    }
+
+    void removeMoved() {
+        std::erase_if(mDocument.objects, [&](const WritableObject& object) { return mRemoved.contains(object.id); });
+        std::erase_if(mDocument.connections, [&](const DocumentConnection& connection) {
+            return mRemoved.contains(connection.source) || mRemoved.contains(connection.destination);
+        });
+    }
+
+    WritableDocument& mDocument;
+    std::unordered_map<std::int64_t, std::size_t> mIndex;
+    std::unordered_map<std::int64_t, std::vector<std::int64_t>> mSources;
+    std::unordered_set<std::int64_t> mRemoved;
+    std::unordered_map<std::int64_t, Weight> mWeights; ///< by channel
+};
+
+} // namespace
+
+void moveShapesInline(WritableDocument& document) { ShapeMover(document).move(); }
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,114 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Who holds whom, from the document's connections.
+#include "document/legacy/LegacyLayout.h"
+
+#include <algorithm>
+#include <iterator>
+#include <map>
+#include <set>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+/// Kinds that exist as parts of takes only.
+constexpr std::string_view kAnimationRecords[] = {"AnimationStack", "AnimationLayer", "AnimationCurveNode",
+                                                  "AnimationCurve"};
+
+bool isAnimation(const WritableObject& object) {
+    return std::find(std::begin(kAnimationRecords), std::end(kAnimationRecords), object.record) !=
+           std::end(kAnimationRecords);
+}
+
+/// Curves and surfaces have records of their own; attributes and meshes stand inside their Models.
+bool standsInModel(const WritableObject& object) {
+    return object.record == "NodeAttribute" || (object.record == "Geometry" && object.subClass == "Mesh");
+}
+
+bool betweenObjects(const DocumentConnection& connection) {
+    return connection.sourceProperty.empty() && connection.destinationProperty.empty();
+}
+
+} // namespace
+
+LegacyLayout::LegacyLayout(const WritableDocument& document) : mDocument(document), mNames(document.objects) {
+    for (const WritableObject& object : document.objects)
+        mObjects.emplace(object.id, &object);
+    findAttributes();
+    findAnimation();
+}
+
+const WritableObject* LegacyLayout::find(std::int64_t id) const {
+    const auto found = mObjects.find(id);
+    return found == mObjects.end() ? nullptr : found->second;
+}
+
+void LegacyLayout::findAttributes() {
+    for (const DocumentConnection& connection : mDocument.connections) {
+        const WritableObject* attribute = find(connection.source);
+        const WritableObject* model = find(connection.destination);
+        const bool holds =
+            betweenObjects(connection) && attribute && model && model->record == "Model" && standsInModel(*attribute);
+        // Of several attributes the first one stands in the Model.
+        if (holds && mAttributes.emplace(model->id, attribute).second)
+            mHolders[attribute->id].push_back(model->id);
+    }
+}
+
+const WritableObject* LegacyLayout::attributeOf(std::int64_t model) const {
+    const auto found = mAttributes.find(model);
+    return found == mAttributes.end() ? nullptr : found->second;
+}
+
+const std::vector<std::int64_t>& LegacyLayout::holdersOf(std::int64_t attribute) const {
+    static const std::vector<std::int64_t> kNone;
+    const auto found = mHolders.find(attribute);
+    return found == mHolders.end() ? kNone : found->second;
+}
+
+bool LegacyLayout::standsAlone(const WritableObject& object) const {
+    return !isAnimation(object) && holdersOf(object.id).empty();
+}
+
+void LegacyLayout::findAnimation() {
+    for (const DocumentConnection& connection : mDocument.connections) {
+        const WritableObject* source = find(connection.source);
+        const WritableObject* destination = find(connection.destination);
+        if (!source)
+            continue;
+        if (source->record == "AnimationLayer" && destination && destination->record == "AnimationStack")
+            mBaseLayers.emplace(destination->name, source->id);
+        if (source->record == "AnimationCurve")
+            mCurves[connection.destination].emplace(connection.destinationProperty, source);
+        if (source->record != "AnimationCurveNode")
+            continue;
+        mMembers[connection.destination].push_back(source->id);
+        if (!connection.destinationProperty.empty() && destination && !isAnimation(*destination))
+            mDriving[source->id].push_back(&connection);
+    }
+}
+
+LegacyLayout::Driven LegacyLayout::drivenBy(std::string_view stack) const {
+    const auto layer = mBaseLayers.find(stack);
+    const auto members = layer == mBaseLayers.end() ? mMembers.end() : mMembers.find(layer->second);
+    if (members == mMembers.end())
+        return {};
+    std::set<const DocumentConnection*> connections; // in their order
+    for (const std::int64_t node : members->second) {
+        if (const auto driving = mDriving.find(node); driving != mDriving.end())
+            connections.insert(driving->second.begin(), driving->second.end());
+    }
+    std::map<std::int64_t, std::vector<DrivenProperty>> byObject;
+    for (const DocumentConnection* connection : connections) {
+        DrivenProperty driven{connection->destinationProperty, find(connection->source), {}};
+        if (const auto curves = mCurves.find(connection->source); curves != mCurves.end())
+            driven.curves = curves->second;
+        byObject[connection->destination].push_back(std::move(driven));
+    }
+    return {std::make_move_iterator(byObject.begin()), std::make_move_iterator(byObject.end())};
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

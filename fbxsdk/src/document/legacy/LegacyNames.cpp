@@ -1,0 +1,46 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Two passes: names that stand alone stay as they are, whatever numbered names their neighbours need.
+#include "document/legacy/LegacyNames.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+/// The root is never declared, but no object may take its name.
+constexpr std::string_view kRootClass = "Model", kRootName = "Scene";
+
+std::string keyOf(std::string_view nameClass, std::string_view name) {
+    std::string key(nameClass);
+    key += "::";
+    key += name;
+    return key;
+}
+
+} // namespace
+
+LegacyNames::LegacyNames(const std::vector<WritableObject>& objects) {
+    mNames.emplace(0, LegacyName{kRootClass, std::string(kRootName)});
+    std::unordered_set<std::string> taken{keyOf(kRootClass, kRootName)};
+    std::vector<const WritableObject*> clashing;
+    for (const WritableObject& object : objects) {
+        if (taken.insert(keyOf(object.nameClass, object.name)).second)
+            mNames.emplace(object.id, LegacyName{object.nameClass, std::string(object.name)});
+        else
+            clashing.push_back(&object);
+    }
+    std::unordered_map<std::string, int> numbers; // the last one that was given behind a name
+    for (const WritableObject* object : clashing) {
+        const std::string base = std::string(object->name) + "_ncl1_";
+        int& number = numbers[keyOf(object->nameClass, base)];
+        std::string name;
+        do
+            name = base + std::to_string(++number);
+        while (!taken.insert(keyOf(object->nameClass, name)).second);
+        mNames.emplace(object->id, LegacyName{object->nameClass, std::move(name)});
+    }
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

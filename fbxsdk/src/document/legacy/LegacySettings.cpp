@@ -1,0 +1,160 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Tables of the settings records, and the frame rates among the time modes.
+#include "document/legacy/LegacySettings.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+struct RateRow {
+    double framesPerSecond;
+    int timeMode;
+};
+constexpr RateRow kRates[] = {
+    {24, 11}, {25, 10}, {30, 6},    {60, 3},  {50, 4},    {48, 5},      {120, 1},
+    {100, 2}, {96, 15}, {1000, 12}, {72, 16}, {29.97, 9}, {23.976, 13}, {59.94, 17},
+};
+constexpr int kCustomTimeMode = 14;
+
+bool readRange(DocumentBuilder& builder, const Record* record, std::int64_t& start, std::int64_t& stop) {
+    std::int64_t range[2] = {0, 0};
+    if (!record || record->numberCount() < 2 || !record->readNumbers(range))
+        return false;
+    start = builder.ticks(range[0]);
+    stop = builder.ticks(range[1]);
+    return true;
+}
+
+bool hasSetting(const Document& document, std::string_view name) {
+    return std::any_of(document.globalSettings.begin(), document.globalSettings.end(),
+                       [&](const DocumentProperty& property) { return property.name == name; });
+}
+
+void addSetting(DocumentBuilder& builder, const DocumentProperty& setting) {
+    if (!hasSetting(builder.document(), setting.name))
+        builder.document().globalSettings.push_back(setting);
+}
+
+void readReals(const Record& parent, std::string_view name, std::span<double> numbers) {
+    const Record* record = parent.child(name);
+    if (!record)
+        return;
+    std::vector<double> found(std::min(record->numberCount(), numbers.size()));
+    if (record->readNumbers(found))
+        std::copy(found.begin(), found.end(), numbers.begin());
+}
+
+void readAmbient(DocumentBuilder& builder, const Record& record) {
+    DocumentLightSettings& settings = builder.document().lightSettings;
+    settings.hasAmbient = record.child("AmbientLightColor") != nullptr;
+    readReals(record, "AmbientLightColor", settings.ambientColor);
+}
+
+void readFog(DocumentBuilder& builder, const Record& record) {
+    DocumentLightSettings& settings = builder.document().lightSettings;
+    settings.hasFog = true;
+    // Most writers misspell the name.
+    const bool misspelt = record.child("FlogEnable") != nullptr;
+    settings.fogEnable = record.childValue(misspelt ? "FlogEnable" : "FogEnable").toInteger() != 0;
+    settings.fogMode = static_cast<int>(std::clamp<std::int64_t>(record.childValue("FogMode").toInteger(), 0, 2));
+    settings.fogDensity = record.childValue("FogDensity").toReal(settings.fogDensity);
+    settings.fogStart = record.childValue("FogStart").toReal(settings.fogStart);
+    settings.fogEnd = record.childValue("FogEnd").toReal(settings.fogEnd);
+    readReals(record, "FogColor", settings.fogColor);
+}
+
+void readRenderer(DocumentBuilder& builder, const Record& record) {
+    if (!record.childValue("DefaultCamera").toText().empty())
+        addSetting(builder, propertyOf("DefaultCamera", "KString", "", "", record.child("DefaultCamera")->values));
+}
+
+/// Frames per second from text or number; 0 when it is neither.
+double rateOf(const Value& value) {
+    if (value.isNumber())
+        return value.toReal();
+    const std::string_view text = value.toText();
+    double rate = 0;
+    const auto result = std::from_chars(text.data(), text.data() + text.size(), rate);
+    return result.ec == std::errc() ? rate : 0;
+}
+
+void addFrameRate(DocumentBuilder& builder, double rate) {
+    // Each file of these generations has a time mode as well, but in another numbering.
+    if (!(rate > 0) || !std::isfinite(rate) || hasSetting(builder.document(), "TimeMode"))
+        return;
+    constexpr double kTolerance = 0.005;
+    const auto* row = std::find_if(std::begin(kRates), std::end(kRates), [&](const RateRow& candidate) {
+        return std::abs(candidate.framesPerSecond - rate) < kTolerance;
+    });
+    const int mode = row == std::end(kRates) ? kCustomTimeMode : row->timeMode;
+    addSetting(builder, propertyOf("TimeMode", "enum", "", "", builder.keep({Value::ofInteger(mode)})));
+    if (mode == kCustomTimeMode)
+        addSetting(builder, propertyOf("CustomFrameRate", "double", "Number", "", builder.keep({Value::ofReal(rate)})));
+}
+
+void readSettings(DocumentBuilder& builder, const Record& record) {
+    addFrameRate(builder, rateOf(record.childValue("FrameRate")));
+    constexpr std::pair<std::string_view, std::string_view> kTimes[] = {{"TimeLineStartTime", "TimeSpanStart"},
+                                                                        {"TimeLineStopTime", "TimeSpanStop"}};
+    for (const auto& [recordName, property] : kTimes)
+        if (const Value& time = record.childValue(recordName); time.isNumber())
+            addSetting(builder, propertyOf(property, "KTime", "Time", "",
+                                           builder.keep({Value::ofInteger(builder.ticks(time.toInteger()))})));
+}
+
+struct SettingsRow {
+    std::string_view name;
+    void (*read)(DocumentBuilder&, const Record&);
+};
+constexpr SettingsRow kSettings[] = {
+    {"AmbientRenderSettings", readAmbient},
+    {"FogOptions", readFog},
+    {"RendererSetting", readRenderer},
+    {"Settings", readSettings},
+};
+
+} // namespace
+
+void readTakeTimes(DocumentBuilder& builder, const Record& takes) {
+    Document& document = builder.document();
+    if (document.activeStackName.empty())
+        document.activeStackName = takes.childValue("Current").toText();
+    for (const Record& record : takes.children()) {
+        if (record.name != "Take")
+            continue;
+        DocumentTake& take = document.takes.emplace_back();
+        take.name = record.value(0).toText();
+        take.hasLocal = readRange(builder, record.child("LocalTime"), take.localStart, take.localStop);
+        take.hasReference = readRange(builder, record.child("ReferenceTime"), take.referenceStart, take.referenceStop);
+    }
+}
+
+void addTakeTimes(DocumentBuilder& builder, const DocumentTake& take, std::vector<DocumentProperty>& properties) {
+    const auto add = [&](std::string_view name, std::int64_t time) {
+        properties.push_back(propertyOf(name, "KTime", "Time", "", builder.keep({Value::ofInteger(time)})));
+    };
+    if (take.hasLocal) {
+        add("LocalStart", take.localStart);
+        add("LocalStop", take.localStop);
+    }
+    if (take.hasReference) {
+        add("ReferenceStart", take.referenceStart);
+        add("ReferenceStop", take.referenceStop);
+    }
+}
+
+void readLegacySettings(DocumentBuilder& builder, const Record& parent) {
+    for (const Record& record : parent.children())
+        for (const SettingsRow& row : kSettings)
+            if (row.name == record.name)
+                row.read(builder, record);
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,110 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Skins, clusters, blend shapes and cache deformers: the mirror of DeformerReading.
+#include <string_view>
+#include <vector>
+
+#include <fbxsdk/FbxBlendShape.h>
+#include <fbxsdk/FbxBlendShapeChannel.h>
+#include <fbxsdk/FbxCluster.h>
+#include <fbxsdk/FbxSkin.h>
+#include <fbxsdk/FbxVertexCacheDeformer.h>
+
+#include "document/RecordWriting.h"
+#include "geometry/GeometryWriting.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+std::string_view skinningName(FbxSkin::EType type) {
+    switch (type) {
+    case FbxSkin::eRigid:
+        return "Rigid";
+    case FbxSkin::eLinear:
+        return "Linear";
+    case FbxSkin::eDualQuaternion:
+        return "DualQuaternion";
+    case FbxSkin::eBlend:
+        return "Blend";
+    }
+    return "Linear";
+}
+
+void writeSkin(const FbxSkin& skin, const VersionTraits& traits, RecordSink& sink) {
+    writeReal(sink, "Link_DeformAcuracy", skin.GetDeformAccuracy());
+    if (traits.idsAndTemplates)
+        writeText(sink, "SkinningType", skinningName(skin.GetSkinningType()));
+    if (const auto count = static_cast<std::size_t>(skin.GetControlPointIndicesCount())) {
+        writeArray<std::int32_t>(sink, "Indexes", {skin.GetControlPointIndices(), count});
+        writeArray<double>(sink, "BlendWeights", {skin.GetControlPointBlendWeights(), count});
+    }
+}
+
+void writeMatrix(RecordSink& sink, std::string_view name, const FbxAMatrix& matrix) {
+    double numbers[16];
+    for (int i = 0; i < 16; ++i)
+        numbers[i] = matrix[i / 4][i % 4];
+    writeArray<double>(sink, name, numbers);
+}
+
+/// Normalising is what an absent record means.
+void writeLinkMode(RecordSink& sink, FbxCluster::ELinkMode mode) {
+    switch (mode) {
+    case FbxCluster::eNormalize:
+        return;
+    case FbxCluster::eAdditive:
+        return writeText(sink, "Mode", "Additive");
+    case FbxCluster::eTotalOne:
+        return writeText(sink, "Mode", "Total1");
+    }
+}
+
+void writePoints(RecordSink& sink, const FbxCluster& cluster) {
+    const auto count = static_cast<std::size_t>(cluster.GetControlPointIndicesCount());
+    if (count == 0)
+        return;
+    writeArray<std::int32_t>(sink, "Indexes", {cluster.GetControlPointIndices(), count});
+    writeArray<double>(sink, "Weights", {cluster.GetControlPointWeights(), count});
+}
+
+/// Files state where the deformed geometry stood as seen from the link.
+void writeCluster(const FbxCluster& cluster, RecordSink& sink) {
+    FbxAMatrix transform, link, associate;
+    cluster.GetTransformMatrix(transform);
+    cluster.GetTransformLinkMatrix(link);
+    cluster.GetTransformAssociateModelMatrix(associate);
+    writeTexts(sink, "UserData", {"", ""});
+    writePoints(sink, cluster);
+    writeMatrix(sink, "Transform", link.Inverse() * transform);
+    writeMatrix(sink, "TransformLink", link);
+    if (cluster.GetAssociateModel() || !associate.IsIdentity())
+        writeMatrix(sink, "TransformAssociateModel", associate);
+    writeLinkMode(sink, cluster.GetLinkMode());
+}
+
+void writeChannel(FbxBlendShapeChannel& channel, RecordSink& sink) {
+    const auto count = static_cast<std::size_t>(channel.GetTargetShapeCount());
+    writeReal(sink, "DeformPercent", channel.DeformPercent.Get());
+    writeArray<double>(sink, "FullWeights", {channel.GetTargetShapeFullWeights(), count});
+}
+
+} // namespace
+
+void writeDeformerVersion(const FbxObject& deformer, const VersionTraits& traits, RecordSink& sink) {
+    constexpr int kVersion = 100, kSkinVersion = 101;
+    writeInteger(sink, "Version", deformer.Is<FbxSkin>() && traits.idsAndTemplates ? kSkinVersion : kVersion);
+}
+
+void writeDeformerRecords(FbxObject& deformer, const VersionTraits& traits, RecordSink& sink) {
+    if (const auto* skin = FbxCast<FbxSkin>(&deformer))
+        writeSkin(*skin, traits, sink);
+    else if (const auto* cluster = FbxCast<FbxCluster>(&deformer))
+        writeCluster(*cluster, sink);
+    else if (auto* channel = FbxCast<FbxBlendShapeChannel>(&deformer))
+        writeChannel(*channel, sink);
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

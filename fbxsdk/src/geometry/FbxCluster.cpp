@@ -1,0 +1,93 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Clusters. The associate model hangs on a property, as older files have it, since a plain source node is the link.
+#include <fbxsdk/FbxCluster.h>
+
+#include <fbxsdk/FbxNode.h>
+
+#include "geometry/DeformerReading.h"
+#include "object/ManagerData.h"
+
+FBXSDK_NAMESPACE_BEGIN
+
+FBXSDK_OBJECT_IMPLEMENT(FbxCluster, FbxSubDeformer, {})
+
+namespace {
+constexpr const char* kAssociateModel = "SrcModelReference";
+}
+
+FbxCluster::FbxCluster(FbxManager& pManager, const detail::ClassInfo& pInfo) : FbxSubDeformer(pManager, pInfo) {}
+
+FbxCluster::~FbxCluster() = default;
+
+FbxSubDeformer::EType FbxCluster::GetSubDeformerType() const { return eCluster; }
+
+void FbxCluster::SetLink(const FbxNode* pNode) {
+    if (pNode == mLink)
+        return;
+    while (mLink && DisconnectSrcObject(mLink)) {
+    }
+    if (pNode)
+        ConnectSrcObject(const_cast<FbxNode*>(pNode)); // the API takes it so; a connection changes both ends
+}
+
+void FbxCluster::SetAssociateModel(FbxNode* pNode) {
+    FbxProperty property = FbxProperty::Create(this, FbxReferenceDT, kAssociateModel);
+    while (FbxNode* former = property.GetSrcObject<FbxNode>()) {
+        if (!property.DisconnectSrcObject(former))
+            break;
+    }
+    if (pNode)
+        property.ConnectSrcObject(pNode);
+}
+
+FbxNode* FbxCluster::GetAssociateModel() const {
+    const FbxProperty property = FindProperty(kAssociateModel);
+    return property.IsValid() ? property.GetSrcObject<FbxNode>() : nullptr;
+}
+
+void FbxCluster::AddControlPointIndex(int pIndex, double pWeight) {
+    ensureLoaded();
+    mIndices.add(pIndex);
+    mWeights.add(pWeight);
+}
+
+int FbxCluster::GetControlPointIndicesCount() const {
+    ensureLoaded();
+    return mIndices.count();
+}
+
+int* FbxCluster::GetControlPointIndices() const {
+    ensureLoaded();
+    return mIndices.count() == 0 ? nullptr : mIndices.data();
+}
+
+double* FbxCluster::GetControlPointWeights() const {
+    ensureLoaded();
+    return mWeights.count() == 0 ? nullptr : mWeights.data();
+}
+
+void FbxCluster::SetTransformParentMatrix(const FbxAMatrix& pMatrix) {
+    mTransformParent = pMatrix;
+    mTransformParentSet = true;
+}
+
+void FbxCluster::setSource(std::unique_ptr<detail::GeometrySource> pSource) { mSource = std::move(pSource); }
+
+void FbxCluster::loadSource() const {
+    const std::unique_ptr<detail::GeometrySource> source = std::move(mSource);
+    detail::readClusterPoints(*source->body, mIndices, mWeights);
+}
+
+void FbxCluster::connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) {
+    FbxSubDeformer::connectionChanged(pSource, pDestination, pConnected);
+    if (&pDestination != this || !pSource.Is<FbxNode>())
+        return;
+    if (!pConnected)
+        mLink = GetSrcObject<FbxNode>();
+    else if (!mLink)
+        mLink = static_cast<FbxNode*>(&pSource);
+}
+
+FBXSDK_NAMESPACE_END

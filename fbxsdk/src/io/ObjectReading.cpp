@@ -1,0 +1,226 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Objects of a document, class by class. The class table gives the class and its properties; the rows below give what
+// a class keeps outside its properties.
+#include "io/ObjectReading.h"
+
+#include <algorithm>
+#include <string>
+
+#include <fbxsdk/FbxAnimCurve.h>
+#include <fbxsdk/FbxAnimCurveNode.h>
+#include <fbxsdk/FbxCamera.h>
+#include <fbxsdk/FbxDeformer.h>
+#include <fbxsdk/FbxGeometryBase.h>
+#include <fbxsdk/FbxMarker.h>
+#include <fbxsdk/FbxNode.h>
+#include <fbxsdk/FbxScene.h>
+#include <fbxsdk/FbxSkeleton.h>
+#include <fbxsdk/FbxSurfaceMaterial.h>
+#include <fbxsdk/FbxTexture.h>
+
+#include "animation/CurveEvaluation.h"
+#include "geometry/DeformerReading.h"
+#include "geometry/GeometryReading.h"
+#include "io/PropertyReading.h"
+#include "object/ManagerData.h"
+#include "schema/Schema.h"
+#include "schema/ShadingLetters.h"
+#include "schema/SubClassNames.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+struct Reading {
+    const std::shared_ptr<const Document>& document;
+    const DocumentObject& source;
+    FbxObject& object;
+
+    template <class T>
+    [[nodiscard]] T& as() const {
+        return static_cast<T&>(object);
+    }
+    [[nodiscard]] const Value& record(std::string_view name) const { return source.body->childValue(name); }
+};
+
+std::string textOf(const Value& value) { return std::string(value.toText()); }
+
+void readNode(const Reading& reading) {
+    auto& node = reading.as<FbxNode>();
+    if (const char letter = reading.record("Shading").toLetter())
+        node.SetShadingMode(shadingModeOf(letter));
+    // A file whose class defaults and objects both leave the flag out means its rotations to be in force.
+    const bool stated = reading.source.property("RotationActive") != nullptr ||
+                        std::any_of(reading.document->templates.begin(), reading.document->templates.end(),
+                                    [](const DocumentTemplate& each) { return each.className == "FbxNode"; });
+    if (!stated)
+        node.SetRotationActive(true);
+}
+
+/// Cameras of old writers state position, up and interest as records only.
+void readCamera(const Reading& reading) {
+    constexpr struct {
+        const char* property;
+        const char* record;
+    } kRecords[] = {{"Position", "Position"}, {"UpVector", "Up"}, {"InterestPosition", "LookAt"}};
+    for (const auto& row : kRecords) {
+        const Record* record = reading.source.body->child(row.record);
+        if (!record || record->values.size() < 3 || reading.source.property(row.property))
+            continue;
+        reading.object.FindProperty(row.property)
+            .Set(FbxDouble3(record->value(0).toReal(), record->value(1).toReal(), record->value(2).toReal()));
+    }
+}
+
+void readSkeleton(const Reading& reading) {
+    for (const auto& row : kSkeletonSubClasses) {
+        if (row.subClass == reading.source.subClass)
+            reading.as<FbxSkeleton>().SetSkeletonType(row.type);
+    }
+}
+
+void readMarker(const Reading& reading) {
+    for (const auto& row : kMarkerSubClasses) {
+        if (row.subClass == reading.source.subClass)
+            reading.as<FbxMarker>().SetType(row.type);
+    }
+}
+
+/// The channels of a curve node are its properties "d|X", "d|Y", … or "d|<property name>".
+void readCurveNode(const Reading& reading) {
+    for (const DocumentProperty& line : reading.source.properties) {
+        if (!line.name.starts_with("d|"))
+            continue;
+        const double value = line.values.empty() ? 0.0 : line.values.front().toReal();
+        reading.as<FbxAnimCurveNode>().addChannel(std::string(line.name.substr(2)).c_str(), value);
+    }
+}
+
+Extrapolation extrapolationOf(const DocumentCurve::Extrapolation& source) {
+    constexpr struct {
+        char letter;
+        ExtrapolationType type;
+    } kLetters[] = {{'R', ExtrapolationType::repetition},
+                    {'M', ExtrapolationType::mirrorRepetition},
+                    {'K', ExtrapolationType::keepSlope},
+                    {'A', ExtrapolationType::relativeRepetition}};
+    for (const auto& row : kLetters) {
+        if (row.letter == source.type)
+            return {row.type, source.repetitions};
+    }
+    return {};
+}
+
+void readCurveKeys(const Reading& reading) {
+    DocumentCurve curve = readCurve(*reading.document, reading.source);
+    CurveKeys& keys = reading.as<FbxAnimCurve>().editKeys();
+    keys.defaultValue = static_cast<float>(curve.defaultValue);
+    keys.times = std::move(curve.times);
+    keys.values = std::move(curve.values);
+    keys.attributeOfKey = std::move(curve.attributeIndex);
+    keys.attributes.reserve(curve.attributes.size());
+    for (const DocumentCurve::Attribute& attribute : curve.attributes) {
+        KeyAttributes& added = keys.attributes.emplace_back();
+        added.flags = attribute.flags;
+        std::copy(std::begin(attribute.data), std::end(attribute.data), added.data.begin());
+    }
+    keys.before = extrapolationOf(curve.pre);
+    keys.after = extrapolationOf(curve.post);
+}
+
+void readMaterial(const Reading& reading) {
+    const std::string model = textOf(reading.record("ShadingModel"));
+    if (!model.empty())
+        reading.as<FbxSurfaceMaterial>().ShadingModel.Set(FbxString(model.c_str()));
+}
+
+void readFileTexture(const Reading& reading) {
+    auto& texture = reading.as<FbxFileTexture>();
+    texture.SetFileName(textOf(reading.record("FileName")).c_str());
+    texture.SetRelativeFileName(textOf(reading.record("RelativeFilename")).c_str());
+}
+
+void readGeometry(const Reading& reading) {
+    attachSource(reading.as<FbxGeometryBase>(), reading.document, reading.source);
+}
+
+void readAnyDeformer(const Reading& reading) { readDeformer(reading.object, reading.document, reading.source); }
+
+using ReadFunction = void (*)(const Reading&);
+
+/// Applied in order to every object that is of the class.
+struct ClassReader {
+    const FbxClassId& id;
+    ReadFunction read;
+};
+
+const ClassReader kReaders[] = {
+    {FbxNode::ClassId, readNode},
+    {FbxCamera::ClassId, readCamera},
+    {FbxSkeleton::ClassId, readSkeleton},
+    {FbxMarker::ClassId, readMarker},
+    {FbxGeometryBase::ClassId, readGeometry},
+    {FbxDeformer::ClassId, readAnyDeformer},
+    {FbxSubDeformer::ClassId, readAnyDeformer},
+    {FbxSurfaceMaterial::ClassId, readMaterial},
+    {FbxFileTexture::ClassId, readFileTexture},
+    {FbxAnimCurveNode::ClassId, readCurveNode},
+    {FbxAnimCurve::ClassId, readCurveKeys},
+};
+
+bool sameText(std::string_view a, std::string_view b) {
+    return std::equal(a.begin(), a.end(), b.begin(), b.end(), [](char x, char y) {
+        const auto lower = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c; };
+        return lower(x) == lower(y);
+    });
+}
+
+/// A material's class follows from its shading model, in any case.
+FbxClassId materialClass(const DocumentObject& source) {
+    const std::string_view model = source.body->childValue("ShadingModel").toText();
+    if (sameText(model, "phong"))
+        return FbxSurfacePhong::ClassId;
+    if (sameText(model, "lambert"))
+        return FbxSurfaceLambert::ClassId;
+    return FbxSurfaceMaterial::ClassId;
+}
+
+FbxClassId classOf(const DocumentObject& source) {
+    if (source.record == "Material")
+        return materialClass(source);
+    const SchemaClass* schema = findSchema(source.record, source.subClass);
+    return schema ? schema->classId() : FbxClassId();
+}
+
+void readTemplates(const Document& document, FbxObject& object) {
+    for (const DocumentTemplate& each : document.templates) {
+        if (each.className == object.GetClassId().GetName())
+            readTemplate(object, each.properties);
+    }
+}
+
+} // namespace
+
+FbxObject* readObject(const std::shared_ptr<const Document>& document, const DocumentObject& source, FbxScene& scene) {
+    const FbxClassId id = classOf(source);
+    if (!id.IsValid())
+        return nullptr;
+    FbxObject* object = ManagerData::createObject(&scene, id, std::string(source.name).c_str());
+    if (!object)
+        return nullptr;
+    object->data().fileId = source.id;
+    readTemplates(*document, *object);
+    // The channels of curve nodes are no properties.
+    if (!object->Is<FbxAnimCurveNode>())
+        readProperties(*object, source.properties);
+    for (const ClassReader& reader : kReaders) {
+        if (id.Is(reader.id))
+            reader.read({document, source, *object});
+    }
+    return object;
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,372 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Objects of a scene, class by class. The class table gives names and properties; the rows below give the records that
+// a class has besides.
+#include "io/ObjectWriting.h"
+
+#include <algorithm>
+#include <cstring>
+
+#include <fbxsdk/FbxAnimCurve.h>
+#include <fbxsdk/FbxAnimCurveNode.h>
+#include <fbxsdk/FbxAnimLayer.h>
+#include <fbxsdk/FbxAnimStack.h>
+#include <fbxsdk/FbxCache.h>
+#include <fbxsdk/FbxCameraStereo.h>
+#include <fbxsdk/FbxCameraSwitcher.h>
+#include <fbxsdk/FbxGlobalCameraSettings.h>
+#include <fbxsdk/FbxLight.h>
+#include <fbxsdk/FbxMarker.h>
+#include <fbxsdk/FbxNode.h>
+#include <fbxsdk/FbxNull.h>
+#include <fbxsdk/FbxScene.h>
+#include <fbxsdk/FbxSkeleton.h>
+#include <fbxsdk/FbxSurfaceMaterial.h>
+#include <fbxsdk/FbxTexture.h>
+#include <fbxsdk/FbxVideo.h>
+
+#include "animation/CurveConversion.h"
+#include "document/RecordWriting.h"
+#include "geometry/GeometryWriting.h"
+#include "io/PropertyWriting.h"
+#include "object/SceneMembers.h"
+#include "schema/ShadingLetters.h"
+#include "schema/SubClassNames.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+std::string_view writtenSubClass(const FbxObject& object, const SchemaClass& schema) {
+    if (const auto* skeleton = FbxCast<FbxSkeleton>(&object))
+        return subClassOf(skeleton->GetSkeletonType());
+    if (const auto* marker = FbxCast<FbxMarker>(&object))
+        return subClassOf(marker->GetType());
+    return schema.subClass == kAnySubClass ? std::string_view() : schema.subClass;
+}
+
+struct Writing {
+    WritableObject& target;
+    FbxObject& object;
+    const VersionTraits& traits;
+    RecordTree& texts;
+
+    template <class T>
+    [[nodiscard]] T& as() const {
+        return static_cast<T&>(object);
+    }
+    void set(std::string_view name, const FbxDataType& type, std::string_view flags, const Value& value) const {
+        setProperty(target.properties,
+                    {name, type.info()->typeName, type.info()->subTypeName, flags, keepValue(texts, value)});
+    }
+};
+
+WriteRecords versionRecord(int version) {
+    return [version](RecordSink& sink, const VersionTraits&) { writeInteger(sink, "Version", version); };
+}
+
+/// What the Model calls itself: the kind of its attribute.
+std::string_view kindOf(FbxNode& node) {
+    const FbxNodeAttribute* attribute = node.GetNodeAttribute();
+    const SchemaClass* schema = attribute ? findSchema(attribute->GetClassId()) : nullptr;
+    return schema ? writtenSubClass(*attribute, *schema) : "Null";
+}
+
+void writeNode(const Writing& writing) {
+    constexpr int kVersion = 232;
+    auto& node = writing.as<FbxNode>();
+    writing.target.subClass = kindOf(node);
+    writing.set("DefaultAttributeIndex", FbxIntDT, "", Value::ofInteger(node.GetNodeAttribute() ? 0 : -1));
+    writing.target.before = versionRecord(kVersion);
+    const bool hidden = node.GetNodeAttribute() && isView(*node.GetNodeAttribute());
+    writing.target.after = [&node, hidden](RecordSink& sink, const VersionTraits& traits) {
+        if (!traits.idsAndTemplates) {
+            writeInteger(sink, "MultiLayer", 0);
+            writeInteger(sink, "MultiTake", 0);
+            if (hidden)
+                writeText(sink, "Hidden", "True");
+        }
+        writeLetter(sink, "Shading", shadingLetterOf(node.GetShadingMode()));
+        writeText(sink, "Culling", "CullingOff");
+    };
+}
+
+void writeVector(RecordSink& sink, std::string_view name, const FbxDouble3& vector) {
+    writeReals(sink, name, {vector[0], vector[1], vector[2]});
+}
+
+/// Some readers look at these records only, so they repeat the properties.
+void writeCameraRecords(RecordSink& sink, const FbxCamera& camera) {
+    constexpr int kGeometryVersion = 124;
+    writeText(sink, "TypeFlags", "Camera");
+    writeInteger(sink, "GeometryVersion", kGeometryVersion);
+    writeVector(sink, "Position", camera.Position.Get());
+    writeVector(sink, "Up", camera.UpVector.Get());
+    writeVector(sink, "LookAt", camera.InterestPosition.Get());
+    writeInteger(sink, "ShowInfoOnMoving", camera.FindProperty("ShowInfoOnMoving").Get<FbxInt>());
+    writeInteger(sink, "ShowAudio", camera.FindProperty("ShowAudio").Get<FbxInt>());
+    writeVector(sink, "AudioColor", camera.FindProperty("AudioColor").Get<FbxDouble3>());
+    writeReal(sink, "CameraOrthoZoom", camera.FindProperty("OrthoZoom").Get<FbxDouble>());
+}
+
+void writeCamera(const Writing& writing) {
+    auto& camera = writing.as<FbxCamera>();
+    writing.target.after = [&camera](RecordSink& sink, const VersionTraits&) { writeCameraRecords(sink, camera); };
+}
+
+void writeCameraStereo(const Writing& writing) {
+    writing.target.after = [](RecordSink& sink, const VersionTraits&) {
+        writeText(sink, "TypeFlags", "CameraStereo");
+        writeInteger(sink, "Version", 100);
+    };
+}
+
+void writeCameraSwitcher(const Writing& writing) {
+    auto& switcher = writing.as<FbxCameraSwitcher>();
+    writing.target.after = [&switcher](RecordSink& sink, const VersionTraits&) {
+        writeInteger(sink, "Version", 101);
+        sink.beginRecord("Name");
+        sink.objectName("Model", switcher.GetName());
+        sink.endRecord();
+        writeInteger(sink, "CameraId", 0);
+        writeInteger(sink, "CameraName", 100);
+        writeEmpty(sink, "CameraIndexName");
+    };
+}
+
+void writeLight(const Writing& writing) {
+    writing.target.after = [](RecordSink& sink, const VersionTraits&) {
+        writeText(sink, "TypeFlags", "Light");
+        writeInteger(sink, "GeometryVersion", 124);
+    };
+}
+
+template <const char* const& flags>
+void writeTypeFlags(const Writing& writing) {
+    writing.target.after = [](RecordSink& sink, const VersionTraits&) { writeText(sink, "TypeFlags", flags); };
+}
+constexpr const char* kNullFlags = "Null";
+constexpr const char* kMarkerFlags = "Marker";
+constexpr const char* kSkeletonFlags = "Skeleton";
+
+/// The record says which class the material is; a name that says another would be read as another.
+std::string shadingModelOf(const FbxSurfaceMaterial& material) {
+    const FbxString stated = material.ShadingModel.Get();
+    const char* const model = material.Is<FbxSurfacePhong>()     ? "phong"
+                              : material.Is<FbxSurfaceLambert>() ? "lambert"
+                                                                 : nullptr;
+    if (model)
+        return stated.CompareNoCase(model) == 0 ? stated.Buffer() : model;
+    const bool claimed = stated.CompareNoCase("phong") == 0 || stated.CompareNoCase("lambert") == 0;
+    return claimed ? "unknown" : stated.Buffer();
+}
+
+void writeMaterial(const Writing& writing) {
+    auto& material = writing.as<FbxSurfaceMaterial>();
+    if (writing.traits.idsAndTemplates) {
+        // What the record says need not be said again. Older files list all properties.
+        const std::string model = shadingModelOf(material);
+        std::erase_if(writing.target.properties, [&](const DocumentProperty& property) {
+            return property.name == "ShadingModel" && property.values.size() == 1 &&
+                   property.values.front().toText() == model;
+        });
+    }
+    writing.target.before = [&material](RecordSink& sink, const VersionTraits&) {
+        writeInteger(sink, "Version", 102);
+        writeText(sink, "ShadingModel", shadingModelOf(material));
+        writeInteger(sink, "MultiLayer", material.MultiLayer.Get() ? 1 : 0);
+    };
+}
+
+void writeTextureName(RecordSink& sink, std::string_view record, std::string_view className, const FbxObject* object) {
+    sink.beginRecord(record);
+    if (object)
+        sink.objectName(className, object->GetName());
+    else
+        sink.text("");
+    sink.endRecord();
+}
+
+void writeFileTexture(const Writing& writing) {
+    auto& texture = writing.as<FbxFileTexture>();
+    writing.target.before = [&texture](RecordSink& sink, const VersionTraits&) {
+        writeText(sink, "Type", "TextureVideoClip");
+        writeInteger(sink, "Version", 202);
+        writeTextureName(sink, "TextureName", "Texture", &texture);
+    };
+    writing.target.after = [&texture](RecordSink& sink, const VersionTraits&) {
+        writeTextureName(sink, "Media", "Video", texture.GetSrcObject<FbxVideo>());
+        writeText(sink, "FileName", texture.GetFileName());
+        writeText(sink, "RelativeFilename", texture.GetRelativeFileName());
+        writeReals(sink, "ModelUVTranslation", {texture.GetTranslationU(), texture.GetTranslationV()});
+        writeReals(sink, "ModelUVScaling", {texture.GetScaleU(), texture.GetScaleV()});
+        writeText(sink, "Texture_Alpha_Source", "None");
+        writeIntegers(sink, "Cropping", {0, 0, 0, 0});
+    };
+}
+
+void writeLayeredTexture(const Writing& writing) {
+    writing.target.before = [](RecordSink& sink, const VersionTraits&) { writeInteger(sink, "LayeredTexture", 101); };
+}
+
+void writeVideo(const Writing& writing) {
+    auto& video = writing.as<FbxVideo>();
+    writing.target.before = [](RecordSink& sink, const VersionTraits&) { writeText(sink, "Type", "Clip"); };
+    writing.target.after = [&video](RecordSink& sink, const VersionTraits&) {
+        writeInteger(sink, "UseMipMap", 0);
+        writeText(sink, "Filename", video.GetFileName().Buffer());
+        writeText(sink, "RelativeFilename", video.GetRelativeFileName().Buffer());
+    };
+}
+
+void writeVersion100(const Writing& writing) { writing.target.before = versionRecord(100); }
+
+void writeStack(const Writing& writing) {
+    auto& stack = writing.as<FbxAnimStack>();
+    const WrittenSpan local = writtenSpan(stack.GetLocalTimeSpan(), stack);
+    const WrittenSpan reference = writtenSpan(stack.GetReferenceTimeSpan(), stack);
+    const std::pair<std::string_view, std::int64_t> times[] = {{"LocalStart", local.start},
+                                                               {"LocalStop", local.stop},
+                                                               {"ReferenceStart", reference.start},
+                                                               {"ReferenceStop", reference.stop}};
+    // All four, in this order, also where the stack itself holds only some that differ from the defaults.
+    std::vector<DocumentProperty>& properties = writing.target.properties;
+    for (const auto& [name, time] : times)
+        std::erase_if(properties, [name = name](const DocumentProperty& property) { return property.name == name; });
+    for (const auto& [name, time] : times)
+        writing.set(name, FbxTimeDT, "", Value::ofInteger(time));
+}
+
+/// The property that a curve node drives; invalid when it drives none.
+FbxProperty drivenProperty(const FbxAnimCurveNode& node) { return node.GetDstProperty(0); }
+
+/// A curve node's channels are its properties: "d|X", … or "d|" and the name of the property that it drives.
+void writeCurveNode(const Writing& writing) {
+    auto& node = writing.as<FbxAnimCurveNode>();
+    const FbxProperty driven = drivenProperty(node);
+    const bool single = node.GetChannelsCount() == 1 && driven.IsValid();
+    const std::string_view typeName = single ? channelTypeName(driven.GetPropertyDataType()) : "Number";
+    for (unsigned int i = 0; i < node.GetChannelsCount(); ++i) {
+        std::string name("d|");
+        name += node.GetChannelName(static_cast<int>(i)).Buffer();
+        writing.target.properties.push_back({writing.texts.keepText(std::move(name)), typeName, "", "A",
+                                             keepValue(writing.texts, Value::ofReal(node.channelValue(i)))});
+    }
+}
+
+void writeCurveKeys(const Writing& writing) {
+    auto& curve = writing.as<FbxAnimCurve>();
+    writing.target.name = {}; // files give curves no names
+    writing.target.curve = [&curve](const VersionTraits& traits) { return documentCurve(curve.keys(), traits); };
+}
+
+void writeGeometry(const Writing& writing) {
+    auto& geometry = writing.as<FbxGeometryBase>();
+    writing.target.after = [&geometry](RecordSink& sink, const VersionTraits& traits) {
+        writeGeometryRecords(geometry, traits, sink);
+    };
+}
+
+void writeAnyDeformer(const Writing& writing) {
+    FbxObject& deformer = writing.object;
+    writing.target.before = [&deformer](RecordSink& sink, const VersionTraits& traits) {
+        writeDeformerVersion(deformer, traits, sink);
+    };
+    writing.target.after = [&deformer](RecordSink& sink, const VersionTraits& traits) {
+        writeDeformerRecords(deformer, traits, sink);
+    };
+}
+
+using WriteFunction = void (*)(const Writing&);
+
+/// The first row counts whose class the object is.
+struct ClassWriter {
+    const FbxClassId& id;
+    WriteFunction write;
+};
+
+const ClassWriter kWriters[] = {
+    {FbxNode::ClassId, writeNode},
+    {FbxCameraStereo::ClassId, writeCameraStereo},
+    {FbxCamera::ClassId, writeCamera},
+    {FbxCameraSwitcher::ClassId, writeCameraSwitcher},
+    {FbxLight::ClassId, writeLight},
+    {FbxNull::ClassId, writeTypeFlags<kNullFlags>},
+    {FbxMarker::ClassId, writeTypeFlags<kMarkerFlags>},
+    {FbxSkeleton::ClassId, writeTypeFlags<kSkeletonFlags>},
+    {FbxGeometryBase::ClassId, writeGeometry},
+    {FbxDeformer::ClassId, writeAnyDeformer},
+    {FbxSubDeformer::ClassId, writeAnyDeformer},
+    {FbxCache::ClassId, writeVersion100},
+    {FbxSurfaceMaterial::ClassId, writeMaterial},
+    {FbxFileTexture::ClassId, writeFileTexture},
+    {FbxLayeredTexture::ClassId, writeLayeredTexture},
+    {FbxVideo::ClassId, writeVideo},
+    {FbxAnimStack::ClassId, writeStack},
+    {FbxAnimCurveNode::ClassId, writeCurveNode},
+    {FbxAnimCurve::ClassId, writeCurveKeys},
+};
+
+/// Widens the span by that of a curve node.
+void widen(FbxTimeSpan& span, bool& found, const FbxAnimCurveNode& node) {
+    FbxTimeSpan keys;
+    if (!node.GetAnimationInterval(keys))
+        return;
+    span.SetStart(found ? std::min(span.GetStart(), keys.GetStart()) : keys.GetStart());
+    span.SetStop(found ? std::max(span.GetStop(), keys.GetStop()) : keys.GetStop());
+    found = true;
+}
+
+} // namespace
+
+bool isView(const FbxNodeAttribute& attribute) {
+    FbxScene* const scene = attribute.GetScene();
+    if (!scene)
+        return false;
+    const FbxGlobalCameraSettings& settings = scene->GlobalCameraSettings();
+    const bool listed = settings.IsProducerCamera(FbxCast<FbxCamera>(&attribute)) ||
+                        &attribute == static_cast<const FbxNodeAttribute*>(settings.GetCameraSwitcher());
+    for (int i = 0; listed && i < attribute.GetNodeCount(); ++i) {
+        if (attribute.GetNode(i)->GetParent())
+            return false;
+    }
+    return listed;
+}
+
+WritableObject writableObject(FbxObject& object, const SchemaClass& schema, const VersionTraits& traits,
+                              RecordTree& texts) {
+    WritableObject target;
+    target.record = schema.record;
+    target.nameClass = schema.nameClass;
+    target.subClass = writtenSubClass(object, schema);
+    target.name = object.data().name;
+    target.templateClass = schema.templateName();
+    const PropertyChoice choice = traits.idsAndTemplates ? PropertyChoice::changed : PropertyChoice::all;
+    target.properties = writableProperties(object, choice, texts);
+    for (const ClassWriter& writer : kWriters) {
+        if (object.GetClassId().Is(writer.id)) {
+            writer.write({target, object, traits, texts});
+            break;
+        }
+    }
+    return target;
+}
+
+WrittenSpan writtenSpan(const FbxTimeSpan& span, const FbxAnimStack& stack) {
+    const WrittenSpan stated{span.GetStart().Get(), span.GetStop().Get()};
+    if (stated.start != 0 || stated.stop != 0)
+        return stated;
+    FbxTimeSpan keys;
+    bool found = false;
+    for (const FbxAnimLayer* layer : sourcesOf<FbxAnimLayer>(stack)) {
+        for (const FbxAnimCurveNode* node : sourcesOf<FbxAnimCurveNode>(*layer))
+            widen(keys, found, *node);
+    }
+    if (!found)
+        return {0, kTicksPerSecond};
+    return {keys.GetStart().Get(), keys.GetStop().Get()};
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,117 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Properties are matched by name alone: type strings vary between writers and change when a property becomes
+// animatable.
+#include "io/PropertyReading.h"
+
+#include <algorithm>
+#include <string>
+
+#include <fbxsdk/FbxObject.h>
+
+#include "object/ObjectData.h"
+#include "object/PropertyTypes.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+FbxDouble4 numbersOf(const DocumentProperty& line) {
+    FbxDouble4 numbers(0, 0, 0, 0);
+    const std::size_t count = std::min<std::size_t>(line.values.size(), 4);
+    for (std::size_t i = 0; i < count; ++i)
+        numbers[static_cast<int>(i)] = line.values[i].toReal();
+    return numbers;
+}
+
+void setValue(FbxProperty& property, const DocumentProperty& line) {
+    if (line.values.empty())
+        return;
+    const Value& first = line.values.front();
+    switch (property.GetPropertyDataType().GetType()) {
+    case eFbxString:
+    case eFbxDateTime:
+        property.Set(FbxString(first.text.data(), first.text.size()));
+        break;
+    case eFbxTime:
+        property.Set(FbxTime(first.toInteger()));
+        break;
+    case eFbxDouble2:
+    case eFbxDouble3:
+    case eFbxDouble4:
+        property.Set(numbersOf(line));
+        break;
+    case eFbxFloat:
+    case eFbxDouble:
+    case eFbxHalfFloat:
+    case eFbxDistance:
+        property.Set(first.toReal());
+        break;
+    default:
+        property.Set(FbxLongLong{first.toInteger()});
+        break;
+    }
+}
+
+void setFlags(FbxProperty& property, std::string_view flags) {
+    constexpr struct {
+        char letter;
+        FbxPropertyFlags::EFlags flag;
+    } kLetters[] = {{'A', FbxPropertyFlags::eAnimatable},
+                    {'+', FbxPropertyFlags::eAnimated},
+                    {'U', FbxPropertyFlags::eUserDefined},
+                    {'H', FbxPropertyFlags::eHidden}};
+    for (const auto& row : kLetters) {
+        if (flags.find(row.letter) != std::string_view::npos)
+            property.ModifyFlag(row.flag, true);
+    }
+}
+
+/// Whether the line says what the class's row says already, so that nothing needs to be stored.
+bool isDefault(const FbxObject& object, int index, const DocumentProperty& line) {
+    const std::span<const PropertyRow> rows = object.data().info->rows;
+    if (static_cast<std::size_t>(index) >= rows.size() || object.data().property(index))
+        return false;
+    const PropertyRow& row = rows[static_cast<std::size_t>(index)];
+    if (row.type->GetType() == eFbxString || line.flags != row.flags)
+        return false;
+    for (std::size_t i = 0; i < std::min<std::size_t>(line.values.size(), 4); ++i) {
+        if (line.values[i].toReal() != row.numbers[i])
+            return false;
+    }
+    return true;
+}
+
+void readProperty(FbxObject& object, const DocumentProperty& line, bool appendUnknown) {
+    const int index = object.data().findProperty(line.name);
+    if (index >= 0) {
+        if (isDefault(object, index, line))
+            return;
+        FbxProperty property(&object, index);
+        setValue(property, line);
+        setFlags(property, line.flags);
+        return;
+    }
+    if (!appendUnknown || line.name.empty())
+        return;
+    FbxProperty property = FbxProperty::Create(&object, dataTypeOf(line.typeName, line.subTypeName),
+                                               std::string(line.name).c_str(), "", /*pCheckForDup=*/false);
+    setValue(property, line);
+    setFlags(property, line.flags);
+}
+
+} // namespace
+
+void readProperties(FbxObject& object, std::span<const DocumentProperty> properties) {
+    for (const DocumentProperty& line : properties)
+        readProperty(object, line, /*appendUnknown=*/true);
+}
+
+void readTemplate(FbxObject& object, std::span<const DocumentProperty> properties) {
+    for (const DocumentProperty& line : properties)
+        readProperty(object, line, /*appendUnknown=*/false);
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,218 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The mirror of PropertyReading. The flag that a property may be animated changes the spelling of its type: files call
+// what can be animated "Number" where they call what cannot "double".
+#include "io/PropertyWriting.h"
+
+#include <algorithm>
+#include <string>
+
+#include <fbxsdk/FbxAnimCurveNode.h>
+
+#include "object/PropertyTypes.h"
+#include "scene/IdleCurveNode.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+/// The two type strings of what may not be animated, and the one of what may.
+constexpr struct {
+    std::string_view fixed, fixedSubType, animatable;
+} kSpellings[] = {{"double", "Number", "Number"}, {"Vector3D", "Vector", "Vector"}, {"ColorRGB", "Color", "Color"},
+                  {"bool", "", "Bool"},           {"int", "Integer", "Integer"},    {"enum", "", "Enum"}};
+
+/// Spells the type as the flag wants it. Other types have one spelling for both.
+void spellType(DocumentProperty& property, bool animatable) {
+    for (const auto& row : kSpellings) {
+        if (animatable && property.typeName == row.fixed && property.subTypeName == row.fixedSubType) {
+            property.typeName = row.animatable;
+            property.subTypeName = {};
+            return;
+        }
+        if (!animatable && property.typeName == row.animatable && property.subTypeName.empty()) {
+            property.typeName = row.fixed;
+            property.subTypeName = row.fixedSubType;
+            return;
+        }
+    }
+}
+
+const FbxAnimCurveNode* curveNodeOf(const ConnectionPoint& source) {
+    return source.property < 0 ? FbxCast<FbxAnimCurveNode>(source.object) : nullptr;
+}
+
+bool isAnimated(const PropertyData& property) {
+    return std::any_of(property.plug.sources.begin(), property.plug.sources.end(), [](const ConnectionPoint* source) {
+        const FbxAnimCurveNode* node = curveNodeOf(*source);
+        return node && !isIdle(*node);
+    });
+}
+
+/// Whether anything in the file leads to or from the property.
+bool isConnected(const PropertyData& property) {
+    const auto isWritten = [](const ConnectionPoint* source) {
+        const FbxAnimCurveNode* node = curveNodeOf(*source);
+        return !node || !isIdle(*node);
+    };
+    return !property.plug.destinations.empty() ||
+           std::any_of(property.plug.sources.begin(), property.plug.sources.end(), isWritten);
+}
+
+/// `L` and `M` with the locked and muted components as bits; nothing when there are none.
+void appendMask(std::string& text, char letter, unsigned flags, unsigned first) {
+    constexpr unsigned kComponents = 0xF;
+    const unsigned mask = flags / first & kComponents;
+    if (mask != 0)
+        text += letter + std::to_string(mask);
+}
+
+std::string flagText(unsigned flags, bool animated) {
+    constexpr struct {
+        unsigned flag;
+        char letter;
+    } kLetters[] = {{FbxPropertyFlags::eAnimatable, 'A'},
+                    {FbxPropertyFlags::eAnimated, '+'},
+                    {FbxPropertyFlags::eUserDefined, 'U'},
+                    {FbxPropertyFlags::eHidden, 'H'}};
+    constexpr unsigned kAnimated = FbxPropertyFlags::eAnimatable | FbxPropertyFlags::eAnimated;
+    // Whether curves drive a property is seen from its connections, not from what a file once said.
+    flags = animated ? flags | kAnimated : flags & ~static_cast<unsigned>(FbxPropertyFlags::eAnimated);
+    std::string text;
+    for (const auto& row : kLetters) {
+        if ((flags & row.flag) != 0)
+            text += row.letter;
+    }
+    appendMask(text, 'L', flags, FbxPropertyFlags::eLockedMember0);
+    appendMask(text, 'M', flags, FbxPropertyFlags::eMutedMember0);
+    return text;
+}
+
+std::span<const Value> valuesOf(const FbxDataType& type, const PropertyValue& value, RecordTree& texts) {
+    switch (type.GetType()) {
+    case eFbxUndefined:
+    case eFbxReference:
+    case eFbxBlob:
+        return {};
+    case eFbxString:
+    case eFbxDateTime:
+        return keepValue(texts, Value::ofText(texts.keepText(value.text)));
+    case eFbxFloat:
+    case eFbxDouble:
+    case eFbxDouble2:
+    case eFbxDouble3:
+    case eFbxDouble4:
+    case eFbxHalfFloat:
+    case eFbxDistance: {
+        const std::span<Value> kept = texts.newValues(componentCount(type.GetType()));
+        std::transform(value.numbers.begin(), value.numbers.begin() + static_cast<std::ptrdiff_t>(kept.size()),
+                       kept.begin(), Value::ofReal);
+        return kept;
+    }
+    default:
+        return keepValue(texts, Value::ofInteger(value.integer));
+    }
+}
+
+DocumentProperty line(std::string_view name, const FbxDataType& type, const PropertyValue& value, std::string flags,
+                      RecordTree& texts) {
+    return {name, type.info()->typeName, type.info()->subTypeName, texts.keepText(std::move(flags)),
+            valuesOf(type, value, texts)};
+}
+
+DocumentProperty defaultLine(const PropertyRow& row, RecordTree& texts) {
+    return line(row.name, *row.type, defaultValue(row), row.flags, texts);
+}
+
+DocumentProperty writableLine(const PropertyData& data, RecordTree& texts) {
+    const bool animated = isAnimated(data);
+    DocumentProperty property = line(data.row ? std::string_view(data.row->name) : std::string_view(data.name),
+                                     data.type, data.value, flagText(data.flags, animated), texts);
+    spellType(property, animated || (data.flags & FbxPropertyFlags::eAnimatable) != 0);
+    return property;
+}
+
+bool sameValue(const PropertyValue& a, const PropertyValue& b, EFbxType type) {
+    if (type == eFbxString || type == eFbxDateTime)
+        return a.text == b.text;
+    return a.numbers == b.numbers && a.integer == b.integer;
+}
+
+/// Connections count too: a reference holds nothing but its connection.
+bool isChanged(const PropertyData& data) {
+    if (!data.row || isConnected(data))
+        return true;
+    constexpr unsigned kWritten = ~static_cast<unsigned>(FbxPropertyFlags::eImported | FbxPropertyFlags::eAnimated);
+    return !sameValue(data.value, defaultValue(*data.row), data.type.GetType()) ||
+           (data.flags & kWritten) != (defaultFlags(*data.row) & kWritten);
+}
+
+} // namespace
+
+std::vector<DocumentProperty> writableProperties(const FbxObject& object, PropertyChoice choice, RecordTree& texts) {
+    std::vector<DocumentProperty> lines;
+    const ObjectData& data = object.data();
+    const std::span<const PropertyRow> rows = data.info->rows;
+    auto next = data.properties.begin();
+    for (int index = 0; index < data.propertyCount(); ++index) {
+        if (next == data.properties.end() && choice == PropertyChoice::changed)
+            break;
+        const bool stored = next != data.properties.end() && (*next)->index == index;
+        const PropertyData* property = stored ? (next++)->get() : nullptr;
+        if (property && (property->flags & FbxPropertyFlags::eNotSavable) != 0)
+            continue;
+        if (property && (choice == PropertyChoice::all || isChanged(*property)))
+            lines.push_back(writableLine(*property, texts));
+        else if (choice == PropertyChoice::all && static_cast<std::size_t>(index) < rows.size())
+            lines.push_back(defaultLine(rows[static_cast<std::size_t>(index)], texts));
+    }
+    return lines;
+}
+
+std::vector<DocumentProperty> templateProperties(std::span<const PropertyRow> rows, RecordTree& texts) {
+    std::vector<DocumentProperty> lines;
+    for (const PropertyRow& row : rows)
+        lines.push_back(defaultLine(row, texts));
+    return lines;
+}
+
+std::string_view propertyName(const FbxObject& object, int index) {
+    const std::span<const PropertyRow> rows = object.data().info->rows;
+    if (static_cast<std::size_t>(index) < rows.size())
+        return rows[static_cast<std::size_t>(index)].name;
+    return object.data().property(index)->name;
+}
+
+void setProperty(std::vector<DocumentProperty>& properties, const DocumentProperty& line) {
+    const auto found = std::find_if(properties.begin(), properties.end(),
+                                    [&](const DocumentProperty& each) { return each.name == line.name; });
+    if (found == properties.end())
+        properties.push_back(line);
+    else
+        found->values = line.values;
+}
+
+std::span<const Value> keepValue(RecordTree& texts, const Value& value) {
+    const std::span<Value> kept = texts.newValues(1);
+    kept[0] = value;
+    return kept;
+}
+
+std::string_view channelTypeName(const FbxDataType& type) {
+    switch (type.GetType()) {
+    case eFbxBool:
+        return type == FbxVisibilityInheritanceDT ? type.info()->typeName : "Bool";
+    case eFbxEnum:
+        return "Enum";
+    case eFbxShort:
+        return "Short";
+    case eFbxInt:
+        return "Integer";
+    default:
+        return type == FbxVisibilityDT ? type.info()->typeName : "Number";
+    }
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,243 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Objects of a scene in the order of files, with ids from a counter, and their connections.
+#include "io/SceneWriting.h"
+
+#include <algorithm>
+#include <unordered_map>
+#include <unordered_set>
+
+#include <fbxsdk/FbxAnimCurve.h>
+#include <fbxsdk/FbxAnimCurveNode.h>
+#include <fbxsdk/FbxAnimLayer.h>
+#include <fbxsdk/FbxAnimStack.h>
+#include <fbxsdk/FbxGlobalCameraSettings.h>
+#include <fbxsdk/FbxGlobalLightSettings.h>
+#include <fbxsdk/FbxNode.h>
+#include <fbxsdk/FbxScene.h>
+
+#include "io/ObjectWriting.h"
+#include "io/PropertyWriting.h"
+#include "object/SceneMembers.h"
+#include "scene/IdleCurveNode.h"
+#include "scene/SceneData.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+/// The order of kinds within a file; others follow in order of membership.
+constexpr std::string_view kRecordOrder[] = {
+    "NodeAttribute",  "Geometry", "Model",          "Material",       "Deformer",           "Video",          "Texture",
+    "LayeredTexture", "Cache",    "AnimationStack", "AnimationCurve", "AnimationCurveNode", "AnimationLayer",
+};
+
+std::size_t rankOf(std::string_view record) {
+    return static_cast<std::size_t>(std::find(std::begin(kRecordOrder), std::end(kRecordOrder), record) -
+                                    std::begin(kRecordOrder));
+}
+
+struct ChosenObject {
+    FbxObject* object;
+    const SchemaClass* schema;
+};
+
+/// Which of the scene's objects a file holds.
+class ObjectChoice {
+public:
+    ObjectChoice(FbxScene& scene, const VersionTraits& traits) : mScene(scene) {
+        if (traits.idsAndTemplates)
+            excludeViews();
+    }
+
+    [[nodiscard]] std::vector<ChosenObject> choose() const {
+        std::vector<ChosenObject> chosen;
+        for (const ConnectionPoint* source : mScene.data().plug.sources) {
+            FbxObject& object = *source->object;
+            if (source->property >= 0 || !isWritten(object))
+                continue;
+            if (const SchemaClass* schema = findSchema(object.GetClassId()))
+                chosen.push_back({&object, schema});
+        }
+        std::stable_sort(chosen.begin(), chosen.end(), [](const ChosenObject& a, const ChosenObject& b) {
+            return rankOf(a.schema->record) < rankOf(b.schema->record);
+        });
+        return chosen;
+    }
+
+private:
+    [[nodiscard]] bool isWritten(const FbxObject& object) const {
+        if (mScene.sceneData().isFixed(object) || mExcluded.count(&object) > 0)
+            return false;
+        if (const auto* node = FbxCast<FbxAnimCurveNode>(&object))
+            return !isIdle(*node);
+        // A component without keys is the value of its curve node and nothing else.
+        const auto* curve = FbxCast<FbxAnimCurve>(&object);
+        return !curve || curve->KeyGetCount() > 0;
+    }
+
+    /// Files from 7.0 on have no place for the application's views.
+    void excludeViews() {
+        for (const FbxNodeAttribute* attribute : sourcesOf<FbxNodeAttribute>(mScene)) {
+            if (!isView(*attribute))
+                continue;
+            mExcluded.insert(attribute);
+            for (int i = 0; i < attribute->GetNodeCount(); ++i)
+                mExcluded.insert(attribute->GetNode(i));
+        }
+    }
+
+    FbxScene& mScene;
+    std::unordered_set<const FbxObject*> mExcluded;
+};
+
+/// Connections between objects of the file. What order files keep among them matters to nobody but human readers; the
+/// order among the sources of one object does.
+class ConnectionWriter {
+public:
+    ConnectionWriter(FbxScene& scene, const std::unordered_map<const FbxObject*, std::int64_t>& ids,
+                     std::vector<DocumentConnection>& connections, RecordTree& texts)
+        : mScene(scene), mIds(ids), mConnections(connections), mTexts(texts) {}
+
+    void write(const std::vector<ChosenObject>& objects) {
+        const FbxNode& root = *mScene.GetRootNode();
+        for (const ConnectionPoint* source : root.data().plug.sources) {
+            if (source->property < 0 && source->object->Is<FbxNode>())
+                add(kHierarchy, idOf(*source->object), 0);
+        }
+        for (const ChosenObject& chosen : objects)
+            writeSources(*chosen.object);
+        std::stable_sort(mRanked.begin(), mRanked.end(),
+                         [](const auto& a, const auto& b) { return a.first < b.first; });
+        for (const auto& [rank, connection] : mRanked)
+            mConnections.push_back(connection);
+    }
+
+private:
+    enum Rank { kHierarchy, kLayers, kLayerMembers, kOthers, kCurves };
+
+    /// 0 for what is not in the file.
+    [[nodiscard]] std::int64_t idOf(const FbxObject& object) const {
+        const auto found = mIds.find(&object);
+        return found == mIds.end() ? 0 : found->second;
+    }
+
+    void add(Rank rank, std::int64_t source, std::int64_t destination, std::string_view sourceProperty = {},
+             std::string_view destinationProperty = {}) {
+        if (source != 0)
+            mRanked.push_back({rank, {source, destination, sourceProperty, destinationProperty}});
+    }
+
+    void writeSources(const FbxObject& destination) {
+        const std::int64_t id = idOf(destination);
+        for (const ConnectionPoint* source : destination.data().plug.sources) {
+            if (!source->object->Is<FbxAnimCurve>() || !destination.Is<FbxAnimCurveNode>())
+                add(rankOf(*source->object, destination), idOf(*source->object), id, nameOf(*source));
+        }
+        for (const auto& property : destination.data().properties) {
+            for (const ConnectionPoint* source : property->plug.sources)
+                add(kOthers, idOf(*source->object), id, nameOf(*source), propertyName(destination, property->index));
+        }
+        if (const auto* node = FbxCast<FbxAnimCurveNode>(&destination))
+            writeChannels(*node, id);
+    }
+
+    void writeChannels(const FbxAnimCurveNode& node, std::int64_t id) {
+        for (unsigned int channel = 0; channel < node.GetChannelsCount(); ++channel) {
+            const int count = node.GetCurveCount(channel);
+            for (int i = 0; i < count; ++i) {
+                std::string name("d|");
+                name += node.GetChannelName(static_cast<int>(channel)).Buffer();
+                add(kCurves, idOf(*node.GetCurve(channel, static_cast<unsigned int>(i))), id, {},
+                    mTexts.keepText(std::move(name)));
+            }
+        }
+    }
+
+    /// Empty for an object.
+    static std::string_view nameOf(const ConnectionPoint& point) {
+        return point.property < 0 ? std::string_view() : propertyName(*point.object, point.property);
+    }
+
+    static Rank rankOf(const FbxObject& source, const FbxObject& destination) {
+        if (source.Is<FbxNode>() && destination.Is<FbxNode>())
+            return kHierarchy;
+        if (destination.Is<FbxAnimStack>())
+            return kLayers;
+        return destination.Is<FbxAnimLayer>() ? kLayerMembers : kOthers;
+    }
+
+    FbxScene& mScene;
+    const std::unordered_map<const FbxObject*, std::int64_t>& mIds;
+    std::vector<DocumentConnection>& mConnections;
+    RecordTree& mTexts;
+    std::vector<std::pair<Rank, DocumentConnection>> mRanked;
+};
+
+void writeSettings(FbxScene& scene, WritableDocument& document) {
+    document.globalSettings = writableProperties(scene.GetGlobalSettings(), PropertyChoice::all, document.texts);
+    const char* const camera = scene.GlobalCameraSettings().GetDefaultCamera();
+    setProperty(document.globalSettings,
+                {"DefaultCamera", "KString", "", "", keepValue(document.texts, Value::ofText(camera))});
+
+    const FbxGlobalLightSettings& lights = scene.GlobalLightSettings();
+    DocumentLightSettings& target = document.lightSettings;
+    const auto store = [](double(&numbers)[4], const FbxColor& color) {
+        numbers[0] = color.mRed;
+        numbers[1] = color.mGreen;
+        numbers[2] = color.mBlue;
+        numbers[3] = color.mAlpha;
+    };
+    store(target.ambientColor, lights.GetAmbientColor());
+    store(target.fogColor, lights.GetFogColor());
+    target.fogEnable = lights.GetFogEnable();
+    target.fogMode = static_cast<int>(lights.GetFogMode());
+    target.fogDensity = lights.GetFogDensity();
+    target.fogStart = lights.GetFogStart();
+    target.fogEnd = lights.GetFogEnd();
+}
+
+void writeTemplates(const std::vector<ChosenObject>& objects, WritableDocument& document) {
+    std::unordered_set<const SchemaClass*> done;
+    for (const ChosenObject& chosen : objects) {
+        if (done.insert(chosen.schema).second)
+            document.templates.push_back({chosen.schema->record, chosen.schema->templateName(),
+                                          templateProperties(chosen.schema->rows, document.texts)});
+    }
+}
+
+void writeTakes(const std::vector<ChosenObject>& objects, WritableDocument& document) {
+    for (const ChosenObject& chosen : objects) {
+        const auto* stack = FbxCast<FbxAnimStack>(chosen.object);
+        if (!stack)
+            continue;
+        const WrittenSpan local = writtenSpan(stack->GetLocalTimeSpan(), *stack);
+        const WrittenSpan reference = writtenSpan(stack->GetReferenceTimeSpan(), *stack);
+        document.takes.push_back({stack->GetName(), local.start, local.stop, reference.start, reference.stop,
+                                  /*hasLocal*/ true, /*hasReference*/ true});
+    }
+}
+
+} // namespace
+
+void writeScene(FbxScene& scene, const VersionTraits& traits, WritableDocument& document) {
+    const std::vector<ChosenObject> objects = ObjectChoice(scene, traits).choose();
+    std::unordered_map<const FbxObject*, std::int64_t> ids;
+    std::int64_t lastId = 0;
+    document.id = ++lastId;
+    for (const ChosenObject& chosen : objects)
+        ids.emplace(chosen.object, ++lastId);
+    document.activeStackName = scene.ActiveAnimStackName.Get().Buffer();
+    writeSettings(scene, document);
+    writeTemplates(objects, document);
+    for (const ChosenObject& chosen : objects) {
+        document.objects.push_back(writableObject(*chosen.object, *chosen.schema, traits, document.texts));
+        document.objects.back().id = ids.at(chosen.object);
+    }
+    ConnectionWriter(scene, ids, document.connections, document.texts).write(objects);
+    writeTakes(objects, document);
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

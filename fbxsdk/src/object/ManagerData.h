@@ -1,0 +1,57 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The manager's list of objects, and the one place where objects are made and freed.
+#pragma once
+
+#include <cstdint>
+#include <span>
+#include <vector>
+
+#include <fbxsdk/FbxIOPluginRegistry.h>
+#include <fbxsdk/FbxManager.h>
+
+#include "object/ObjectData.h"
+#include "scene/NodeEvaluation.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+class ManagerData {
+public:
+    template <class T>
+    static FbxObject* construct(FbxManager& manager, const ClassInfo& info) {
+        return new T(manager, info);
+    }
+    template <class T>
+    static T* create(FbxManager* manager, const char* name) {
+        return static_cast<T*>(createObject(manager, T::ClassId, name));
+    }
+    template <class T>
+    static T* create(FbxObject* container, const char* name) {
+        return static_cast<T*>(createObject(container, T::ClassId, name));
+    }
+
+    /// Null for a null manager or an abstract class.
+    static FbxObject* createObject(FbxManager* manager, const FbxClassId& id, const char* name);
+    /// The same, connected as a source of the container.
+    static FbxObject* createObject(FbxObject* container, const FbxClassId& id, const char* name);
+    /// Cuts what connects the objects with others and frees them. What connects them with each other needs no cutting.
+    static void destroyTogether(std::span<FbxObject* const> objects);
+    /// Frees everything at once, without cutting connections one by one.
+    void destroyAll();
+
+    void enter(FbxObject& object);
+    void leave(FbxObject& object);
+
+    std::vector<FbxObject*> objects;
+    bool tearingDown = false;
+    /// Grows with every change of a value, a key or a connection; evaluation caches compare it.
+    std::uint64_t revision = 0;
+    EvaluationBudget evaluationBudget;
+    FbxIOPluginRegistry registry;
+    FbxIOSettings* settings = nullptr;
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

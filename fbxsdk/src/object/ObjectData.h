@@ -1,0 +1,152 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What stands behind an object: its class, its name, its properties and its connections.
+//
+// A property of a class costs nothing until somebody changes or connects it: the class's row gives its type and
+// default, and a PropertyData is made on the first write. Properties are addressed by index: the rows of the class
+// first, in their order, then the dynamic ones in order of creation.
+#pragma once
+
+#include <array>
+#include <memory>
+#include <span>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+#include <fbxsdk/FbxDataType.h>
+#include <fbxsdk/FbxObject.h>
+
+#include "object/ConnectionList.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// One property of a class: a line of the class's property template.
+struct PropertyRow {
+    const char* name;
+    const FbxDataType* type;
+    const char* flags; ///< as in files: "A" animatable, "H" hidden, "U" user-defined
+    std::array<double, 4> numbers{};
+    const char* text = "";
+};
+
+/// One class of objects. The rows are the whole list of the class, inherited ones included, in file order.
+struct ClassInfo {
+    const char* name; ///< "FbxNode"
+    const ClassInfo* parent;
+    std::span<const PropertyRow> rows;
+    /// Makes an object of the class; null for abstract classes.
+    FbxObject* (*construct)(FbxManager& manager, const ClassInfo& info) = nullptr;
+};
+
+/// One end of connections: an object, or one of its properties.
+struct ConnectionPoint {
+    FbxObject* object = nullptr;
+    int property = -1; ///< index of the property; -1 for the object itself
+    ConnectionList sources;
+    ConnectionList destinations;
+};
+
+struct PropertyValue {
+    std::array<double, 4> numbers{};
+    std::int64_t integer = 0; ///< of whole-number types and times, exactly
+    std::string text;
+};
+
+/// A property that differs from its row, is connected, or is dynamic.
+struct PropertyData {
+    int index = -1;
+    FbxDataType type;
+    unsigned flags = 0; ///< FbxPropertyFlags
+    PropertyValue value;
+    ConnectionPoint plug;
+    std::string name, label;          ///< of dynamic properties
+    const PropertyRow* row = nullptr; ///< null for dynamic ones
+};
+
+struct ObjectData {
+    const ClassInfo* info = nullptr;
+    FbxManager* manager = nullptr;
+    FbxScene* scene = nullptr;
+    std::string name;
+    ConnectionPoint plug;
+    std::size_t managerSlot = 0;                           ///< place in the manager's list
+    std::vector<std::unique_ptr<PropertyData>> properties; ///< sorted by index
+    std::vector<PropertyData*> dynamicProperties;          ///< in order of creation
+    /// Index by name, once there are many dynamic properties; of several of one name the first.
+    std::unique_ptr<std::unordered_map<std::string_view, int>> dynamicIndex;
+    std::int64_t fileId = 0; ///< id in the file it was read from; 0 if none
+    bool doomed = false;     ///< about to be freed together with others
+
+    /// Index by name over the rows of the class and the dynamic properties; -1 when there is none.
+    [[nodiscard]] int findProperty(std::string_view propertyName, bool caseSensitive = true) const;
+    /// The data behind an index; null while the property stands as its row says.
+    [[nodiscard]] PropertyData* property(int index) const;
+    /// The same, made from the row on first use.
+    PropertyData& materialise(int index);
+    [[nodiscard]] int propertyCount() const;
+    /// A new dynamic property, behind all others.
+    PropertyData& appendProperty(const FbxDataType& type, std::string propertyName);
+
+    /// Connects two ends, spreads membership and tells both objects. False when they are connected already, when an
+    /// object would be its own source, when the ends belong to two managers, and when an object will not have it.
+    static bool connect(ConnectionPoint& source, ConnectionPoint& destination);
+    static bool disconnect(ConnectionPoint& source, ConnectionPoint& destination);
+    /// The bare connection, without telling anybody.
+    static void link(ConnectionPoint& source, ConnectionPoint& destination);
+    /// Tells both objects of a connection between them that was made or cut.
+    static void announce(FbxObject& source, FbxObject& destination, bool connected);
+    void announceScene(FbxScene* joined);
+    /// Cuts the connections to objects that are not doomed.
+    void disconnectFromSurvivors();
+
+private:
+    void indexDynamicProperties();
+};
+
+/// Stands for "no property in particular": the parent of all properties of an object.
+inline constexpr int kRootProperty = -1;
+
+[[nodiscard]] PropertyValue defaultValue(const PropertyRow& row);
+[[nodiscard]] unsigned defaultFlags(const PropertyRow& row);
+[[nodiscard]] bool isConnected(const ConnectionPoint& source, const ConnectionPoint& destination);
+/// Makes the object, and everything that feeds it, a member of the scene; those in a scene already stay there.
+void joinScene(FbxObject& object, FbxScene& scene);
+/// Ends the object's membership. What feeds it stays: it is a source of the scene in its own right.
+void leaveScene(FbxObject& object);
+
+/// A typed member of a class, bound to the row of that name.
+template <class T>
+FbxPropertyT<T> bindProperty(FbxObject& object, const char* name) {
+    return FbxPropertyT<T>(FbxProperty(&object, object.data().findProperty(name)));
+}
+
+} // namespace detail
+
+/// What every concrete class defines once, in its source: identity, rows and factories.
+#define FBXSDK_OBJECT_IMPLEMENT(Class, Parent, Rows)                                                                   \
+    namespace detail {                                                                                                 \
+    extern const ClassInfo k##Class##Info;                                                                             \
+    extern const ClassInfo k##Parent##Info;                                                                            \
+    constinit const ClassInfo k##Class##Info{#Class, &k##Parent##Info, Rows, &ManagerData::construct<Class>};          \
+    }                                                                                                                  \
+    constinit const FbxClassId Class::ClassId{&detail::k##Class##Info};                                                \
+    Class* Class::Create(FbxManager* pManager, const char* pName) {                                                    \
+        return detail::ManagerData::create<Class>(pManager, pName);                                                    \
+    }                                                                                                                  \
+    Class* Class::Create(FbxObject* pContainer, const char* pName) {                                                   \
+        return detail::ManagerData::create<Class>(pContainer, pName);                                                  \
+    }
+
+#define FBXSDK_ABSTRACT_IMPLEMENT(Class, Parent)                                                                       \
+    namespace detail {                                                                                                 \
+    extern const ClassInfo k##Class##Info;                                                                             \
+    extern const ClassInfo k##Parent##Info;                                                                            \
+    constinit const ClassInfo k##Class##Info{#Class, &k##Parent##Info, {}, nullptr};                                   \
+    }                                                                                                                  \
+    constinit const FbxClassId Class::ClassId{&detail::k##Class##Info};
+
+FBXSDK_NAMESPACE_END

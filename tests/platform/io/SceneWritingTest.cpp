@@ -1,0 +1,649 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What a scene holds, a file of any version gives back: nodes, attributes, materials, settings.
+#include "io/SceneWriting.h"
+
+#include <limits>
+#include <string>
+#include <vector>
+
+#include <fbxsdk/FbxCache.h>
+#include <fbxsdk/FbxCamera.h>
+#include <fbxsdk/FbxCameraStereo.h>
+#include <fbxsdk/FbxCameraSwitcher.h>
+#include <fbxsdk/FbxGlobalCameraSettings.h>
+#include <fbxsdk/FbxGlobalLightSettings.h>
+#include <fbxsdk/FbxLODGroup.h>
+#include <fbxsdk/FbxLight.h>
+#include <fbxsdk/FbxMarker.h>
+#include <fbxsdk/FbxMesh.h>
+#include <fbxsdk/FbxNull.h>
+#include <fbxsdk/FbxSkeleton.h>
+#include <fbxsdk/FbxSurfaceMaterial.h>
+#include <fbxsdk/FbxTexture.h>
+#include <fbxsdk/FbxVertexCacheDeformer.h>
+#include <fbxsdk/FbxVideo.h>
+
+#include "ExportFixture.h"
+
+namespace {
+
+using namespace fbxsdk;
+
+class SceneWriting : public exporting::EveryLayout {
+protected:
+    static FbxNode* childOf(FbxScene* copy, int index = 0) { return copy->GetRootNode()->GetChild(index); }
+    /// The attribute of the first node.
+    template <class T>
+    static T* attributeOf(FbxScene* copy) {
+        FbxNode* node = childOf(copy);
+        T* attribute = node ? FbxCast<T>(node->GetNodeAttribute()) : nullptr;
+        EXPECT_NE(attribute, nullptr);
+        return attribute;
+    }
+};
+
+INSTANTIATE_TEST_SUITE_P(Versions, SceneWriting, testing::ValuesIn(exporting::allLayouts()));
+
+void expectVector(const FbxDouble3& actual, double x, double y, double z) {
+    EXPECT_EQ(actual[0], x);
+    EXPECT_EQ(actual[1], y);
+    EXPECT_EQ(actual[2], z);
+}
+
+TEST_P(SceneWriting, StatesTheVersion) {
+    writeAndRead();
+
+    const int number = static_cast<int>(detail::findVersion(GetParam().version)->version);
+    EXPECT_EQ(version[0] * 1000 + version[1] * 100, number);
+}
+
+TEST_P(SceneWriting, WritesASceneWithoutAnything) {
+    FbxScene* copy = writeAndRead();
+
+    EXPECT_EQ(copy->GetRootNode()->GetChildCount(), 0);
+    EXPECT_EQ(copy->GetCurrentAnimationStack(), nullptr);
+}
+
+TEST_P(SceneWriting, KeepsTheTreeAndTheOrderOfChildren) {
+    FbxNode* b = addNode("b");
+    FbxNode* a = addNode("a");
+    FbxNode* inner2 = make<FbxNode>("inner2");
+    FbxNode* inner1 = make<FbxNode>("inner1");
+    a->AddChild(inner1);
+    a->AddChild(inner2);
+    inner2->AddChild(make<FbxNode>("leaf"));
+
+    FbxScene* copy = writeAndRead();
+
+    ASSERT_EQ(copy->GetRootNode()->GetChildCount(), 2);
+    EXPECT_STREQ(childOf(copy, 0)->GetName(), b->GetName());
+    EXPECT_STREQ(childOf(copy, 1)->GetName(), "a");
+    ASSERT_EQ(childOf(copy, 1)->GetChildCount(), 2);
+    EXPECT_STREQ(childOf(copy, 1)->GetChild(0)->GetName(), "inner1");
+    ASSERT_EQ(childOf(copy, 1)->GetChild(1)->GetChildCount(), 1);
+    EXPECT_STREQ(childOf(copy, 1)->GetChild(1)->GetChild(0)->GetName(), "leaf");
+}
+
+TEST_P(SceneWriting, KeepsEveryTransformPropertyOfANode) {
+    FbxNode* node = addNode("node");
+    node->LclTranslation.Set(FbxDouble3(1.25, -2.5, 1e-9));
+    node->LclRotation.Set(FbxDouble3(10, 20, 30));
+    node->LclScaling.Set(FbxDouble3(2, 1.0 / 3, -1));
+    node->SetRotationOrder(FbxNode::eSourcePivot, FbxEuler::eOrderZYX);
+    node->SetRotationActive(true);
+    node->SetPreRotation(FbxNode::eSourcePivot, FbxVector4(1, 2, 3));
+    node->SetPostRotation(FbxNode::eSourcePivot, FbxVector4(0, -90, 0));
+    node->SetRotationPivot(FbxNode::eSourcePivot, FbxVector4(4, 5, 6));
+    node->SetRotationOffset(FbxNode::eSourcePivot, FbxVector4(7, 8, 9));
+    node->SetScalingPivot(FbxNode::eSourcePivot, FbxVector4(-1, -2, -3));
+    node->SetScalingOffset(FbxNode::eSourcePivot, FbxVector4(-4, -5, -6));
+    node->SetGeometricTranslation(FbxNode::eSourcePivot, FbxVector4(0.1, 0.2, 0.3));
+    node->SetGeometricRotation(FbxNode::eSourcePivot, FbxVector4(40, 50, 60));
+    node->SetGeometricScaling(FbxNode::eSourcePivot, FbxVector4(3, 4, 5));
+    node->SetTransformationInheritType(FbxTransform::eInheritRrs);
+    node->Visibility.Set(0.0);
+    node->SetShadingMode(FbxNode::eTextureShading);
+
+    FbxNode* back = childOf(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    for (FbxProperty property = node->GetFirstProperty(); property.IsValid();
+         property = node->GetNextProperty(property)) {
+        if (property.GetName() == "DefaultAttributeIndex")
+            continue;
+        const auto expected = property.Get<FbxDouble4>();
+        const auto actual = back->FindProperty(property.GetNameAsCStr()).Get<FbxDouble4>();
+        for (int i = 0; i < 4; ++i)
+            EXPECT_EQ(actual[i], expected[i]) << property.GetNameAsCStr();
+    }
+    EXPECT_EQ(back->GetShadingMode(), FbxNode::eTextureShading);
+}
+
+TEST_P(SceneWriting, KeepsEveryShadingMode) {
+    constexpr FbxNode::EShadingMode kModes[] = {FbxNode::eHardShading,    FbxNode::eWireFrame,
+                                                FbxNode::eFlatShading,    FbxNode::eLightShading,
+                                                FbxNode::eTextureShading, FbxNode::eFullShading};
+    for (const FbxNode::EShadingMode mode : kModes)
+        addNode(std::to_string(mode).c_str())->SetShadingMode(mode);
+
+    FbxScene* copy = writeAndRead();
+
+    for (int i = 0; i < static_cast<int>(std::size(kModes)); ++i)
+        EXPECT_EQ(childOf(copy, i)->GetShadingMode(), kModes[i]);
+}
+
+TEST_P(SceneWriting, KeepsNamesWithAnythingInThem) {
+    const std::string names[] = {
+        "plain",        "two words", "a \"quoted\" name", "Model::colons::", "line\nbreak", "return\r\nboth",
+        "größe 寸法 🎥", "C:\\path",  "{ braces }",        "semicolon; end",  "&amp;",       std::string(5000, 'x')};
+    for (const std::string& name : names)
+        addNode(name.c_str());
+
+    FbxScene* copy = writeAndRead();
+
+    ASSERT_EQ(copy->GetRootNode()->GetChildCount(), static_cast<int>(std::size(names)));
+    for (int i = 0; i < static_cast<int>(std::size(names)); ++i)
+        EXPECT_STREQ(childOf(copy, i)->GetName(), names[i].c_str());
+}
+
+TEST_P(SceneWriting, KeepsAnEmptyName) {
+    addNode("");
+
+    FbxScene* copy = writeAndRead();
+
+    ASSERT_EQ(copy->GetRootNode()->GetChildCount(), 1);
+    EXPECT_STREQ(childOf(copy)->GetName(), "");
+}
+
+TEST_P(SceneWriting, TellsNodesOfOneNameApart) {
+    addNode("same")->LclTranslation.Set(FbxDouble3(1, 0, 0));
+    addNode("same")->LclTranslation.Set(FbxDouble3(2, 0, 0));
+    addNode("same_ncl1_1")->LclTranslation.Set(FbxDouble3(3, 0, 0));
+    addNode("Scene")->LclTranslation.Set(FbxDouble3(4, 0, 0)); // what old files call the root
+
+    FbxScene* copy = writeAndRead();
+
+    const std::vector<std::string> expected =
+        GetParam().hasIds() ? std::vector<std::string>{"same", "same", "same_ncl1_1", "Scene"}
+                            : std::vector<std::string>{"same", "same_ncl1_2", "same_ncl1_1", "Scene_ncl1_1"};
+    ASSERT_EQ(copy->GetRootNode()->GetChildCount(), 4);
+    for (int i = 0; i < 4; ++i) {
+        EXPECT_EQ(childOf(copy, i)->GetName(), expected[static_cast<std::size_t>(i)]);
+        EXPECT_EQ(childOf(copy, i)->LclTranslation.Get()[0], i + 1);
+    }
+}
+
+TEST_P(SceneWriting, LeavesANodeWithoutAttributeWithoutOne) {
+    addNode("empty");
+
+    EXPECT_EQ(childOf(writeAndRead())->GetNodeAttribute(), nullptr);
+}
+
+TEST_P(SceneWriting, KeepsACamera) {
+    FbxCamera* camera = make<FbxCamera>("camera");
+    addNode("node", camera);
+    camera->Position.Set(FbxDouble3(1, 2, 3));
+    camera->UpVector.Set(FbxDouble3(0, 0, 1));
+    camera->InterestPosition.Set(FbxDouble3(4, 5, 6));
+    camera->Roll.Set(12.5);
+    camera->ProjectionType.Set(FbxCamera::eOrthogonal);
+    camera->FilmWidth.Set(1.41732);
+    camera->FilmHeight.Set(0.94488);
+    camera->FocalLength.Set(35.0);
+    camera->FieldOfView.Set(54.43);
+    camera->NearPlane.Set(0.1);
+    camera->FarPlane.Set(123456.75);
+    camera->ApertureMode.Set(FbxCamera::eHorizontal);
+    camera->FilmOffsetX.Set(0.25);
+
+    FbxCamera* back = attributeOf<FbxCamera>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    expectVector(back->Position.Get(), 1, 2, 3);
+    expectVector(back->UpVector.Get(), 0, 0, 1);
+    expectVector(back->InterestPosition.Get(), 4, 5, 6);
+    EXPECT_EQ(back->Roll.Get(), 12.5);
+    EXPECT_EQ(back->ProjectionType.Get(), FbxCamera::eOrthogonal);
+    EXPECT_EQ(back->FilmWidth.Get(), 1.41732);
+    EXPECT_EQ(back->FilmHeight.Get(), 0.94488);
+    EXPECT_EQ(back->FocalLength.Get(), 35.0);
+    EXPECT_EQ(back->FieldOfView.Get(), 54.43);
+    EXPECT_EQ(back->NearPlane.Get(), 0.1);
+    EXPECT_EQ(back->FarPlane.Get(), 123456.75);
+    EXPECT_EQ(back->ApertureMode.Get(), FbxCamera::eHorizontal);
+    EXPECT_EQ(back->FilmOffsetX.Get(), 0.25);
+}
+
+TEST_P(SceneWriting, KeepsALight) {
+    FbxLight* light = make<FbxLight>("light");
+    addNode("node", light);
+    light->LightType.Set(FbxLight::eSpot);
+    light->Color.Set(FbxDouble3(0.25, 0.5, 0.75));
+    light->Intensity.Set(250.0);
+    light->InnerAngle.Set(20.0);
+    light->OuterAngle.Set(60.0);
+    light->CastLight.Set(false);
+    light->CastShadows.Set(true);
+    light->DecayType.Set(FbxLight::eQuadratic);
+
+    FbxLight* back = attributeOf<FbxLight>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    EXPECT_EQ(back->LightType.Get(), FbxLight::eSpot);
+    expectVector(back->Color.Get(), 0.25, 0.5, 0.75);
+    EXPECT_EQ(back->Intensity.Get(), 250.0);
+    EXPECT_EQ(back->InnerAngle.Get(), 20.0);
+    EXPECT_EQ(back->OuterAngle.Get(), 60.0);
+    EXPECT_FALSE(back->CastLight.Get());
+    EXPECT_TRUE(back->CastShadows.Get());
+    EXPECT_EQ(back->DecayType.Get(), FbxLight::eQuadratic);
+}
+
+TEST_P(SceneWriting, KeepsANull) {
+    FbxNull* null = make<FbxNull>("null");
+    addNode("node", null);
+    null->Size.Set(12.0);
+    null->Look.Set(FbxNull::eNone);
+
+    FbxNull* back = attributeOf<FbxNull>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    EXPECT_EQ(back->Size.Get(), 12.0);
+    EXPECT_EQ(back->Look.Get(), FbxNull::eNone);
+}
+
+TEST_P(SceneWriting, KeepsAMarkerOfEveryType) {
+    for (const FbxMarker::EType type :
+         {FbxMarker::eStandard, FbxMarker::eOptical, FbxMarker::eEffectorFK, FbxMarker::eEffectorIK}) {
+        FbxMarker* marker = make<FbxMarker>("marker");
+        marker->SetType(type);
+        marker->Look.Set(FbxMarker::eSphere);
+        marker->Size.Set(3.0);
+        marker->DrawLink.Set(false);
+        addNode(std::to_string(type).c_str(), marker);
+    }
+
+    FbxScene* copy = writeAndRead();
+
+    for (int i = 0; i < 4; ++i) {
+        FbxMarker* back = FbxCast<FbxMarker>(childOf(copy, i)->GetNodeAttribute());
+        ASSERT_NE(back, nullptr);
+        EXPECT_EQ(back->GetType(), i);
+        EXPECT_EQ(back->Look.Get(), FbxMarker::eSphere);
+        EXPECT_EQ(back->Size.Get(), 3.0);
+        EXPECT_FALSE(back->DrawLink.Get());
+    }
+}
+
+TEST_P(SceneWriting, KeepsABoneOfEveryType) {
+    for (const FbxSkeleton::EType type :
+         {FbxSkeleton::eRoot, FbxSkeleton::eLimb, FbxSkeleton::eLimbNode, FbxSkeleton::eEffector}) {
+        FbxSkeleton* bone = make<FbxSkeleton>("bone");
+        bone->SetSkeletonType(type);
+        bone->Size.Set(33.25);
+        addNode(std::to_string(type).c_str(), bone);
+    }
+
+    FbxScene* copy = writeAndRead();
+
+    for (int i = 0; i < 4; ++i) {
+        FbxSkeleton* back = FbxCast<FbxSkeleton>(childOf(copy, i)->GetNodeAttribute());
+        ASSERT_NE(back, nullptr);
+        EXPECT_EQ(back->GetSkeletonType(), i);
+        EXPECT_EQ(back->Size.Get(), 33.25);
+    }
+}
+
+TEST_P(SceneWriting, KeepsAStereoCameraWithItsTwoCameras) {
+    FbxCameraStereo* stereo = make<FbxCameraStereo>("stereo");
+    addNode("node", stereo);
+    stereo->InteraxialSeparation.Set(6.5);
+    FbxCamera* left = make<FbxCamera>("left");
+    FbxCamera* right = make<FbxCamera>("right");
+    left->FocalLength.Set(21.0);
+    right->FocalLength.Set(22.0);
+    stereo->SetLeftCamera(left);
+    stereo->SetRightCamera(right);
+
+    FbxCameraStereo* back = attributeOf<FbxCameraStereo>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    EXPECT_EQ(back->InteraxialSeparation.Get(), 6.5);
+    ASSERT_NE(back->GetLeftCamera(), nullptr);
+    ASSERT_NE(back->GetRightCamera(), nullptr);
+    EXPECT_EQ(back->GetLeftCamera()->FocalLength.Get(), 21.0);
+    EXPECT_EQ(back->GetRightCamera()->FocalLength.Get(), 22.0);
+}
+
+TEST_P(SceneWriting, KeepsALevelOfDetailGroup) {
+    addNode("node", make<FbxLODGroup>("group"));
+
+    attributeOf<FbxLODGroup>(writeAndRead());
+}
+
+TEST_P(SceneWriting, KeepsInstancesOfOneAttribute) {
+    FbxLight* light = make<FbxLight>("light");
+    addNode("first", light);
+    addNode("second", light);
+
+    FbxScene* copy = writeAndRead();
+
+    ASSERT_NE(childOf(copy, 0)->GetNodeAttribute(), nullptr);
+    EXPECT_EQ(childOf(copy, 0)->GetNodeAttribute(), childOf(copy, 1)->GetNodeAttribute());
+}
+
+TEST_P(SceneWriting, KeepsWhatANodeLooksAt) {
+    FbxNode* target = addNode("target");
+    FbxNode* up = addNode("up");
+    FbxNode* camera = addNode("camera", make<FbxCamera>("camera"));
+    camera->SetTarget(target);
+    camera->SetTargetUp(up);
+
+    FbxScene* copy = writeAndRead();
+
+    EXPECT_EQ(childOf(copy, 2)->GetTarget(), childOf(copy, 0));
+    EXPECT_EQ(childOf(copy, 2)->GetTargetUp(), childOf(copy, 1));
+}
+
+TEST_P(SceneWriting, KeepsUserProperties) {
+    FbxNode* node = addNode("node");
+    const auto add = [&](const FbxDataType& type, const char* name) {
+        FbxProperty property = FbxProperty::Create(node, type, name);
+        property.ModifyFlag(FbxPropertyFlags::eUserDefined, true);
+        return property;
+    };
+    add(FbxBoolDT, "a bool").Set(true);
+    add(FbxIntDT, "an int").Set(-7);
+    add(FbxLongLongDT, "a long").Set(FbxLongLong{1} << 60);
+    add(FbxFloatDT, "a float").Set(0.1F);
+    add(FbxDoubleDT, "a double").Set(0.1);
+    add(FbxDouble2DT, "a pair").Set(FbxDouble2(1.5, 2.5));
+    add(FbxDouble3DT, "a vector").Set(FbxDouble3(1, 2, 3));
+    add(FbxDouble4DT, "four").Set(FbxDouble4(1, 2, 3, 4));
+    add(FbxColor3DT, "a colour").Set(FbxDouble3(0.1, 0.2, 0.3));
+    add(FbxStringDT, "a text").Set("with \"quotes\"\nand lines");
+    add(FbxTimeDT, "a time").Set(FbxTime(123456789012345));
+    add(FbxEnumDT, "an enum").Set(FbxEnum{3});
+
+    FbxNode* back = childOf(writeAndRead());
+
+    EXPECT_EQ(back->FindProperty("a bool").Get<FbxBool>(), true);
+    EXPECT_EQ(back->FindProperty("an int").Get<FbxInt>(), -7);
+    EXPECT_EQ(back->FindProperty("a long").Get<FbxLongLong>(), FbxLongLong{1} << 60);
+    EXPECT_EQ(back->FindProperty("a float").Get<FbxFloat>(), 0.1F);
+    EXPECT_EQ(back->FindProperty("a double").Get<FbxDouble>(), 0.1);
+    EXPECT_EQ(back->FindProperty("a pair").Get<FbxDouble2>()[1], 2.5);
+    expectVector(back->FindProperty("a vector").Get<FbxDouble3>(), 1, 2, 3);
+    EXPECT_EQ(back->FindProperty("four").Get<FbxDouble4>()[3], 4.0);
+    expectVector(back->FindProperty("a colour").Get<FbxDouble3>(), 0.1, 0.2, 0.3);
+    EXPECT_STREQ(back->FindProperty("a text").Get<FbxString>().Buffer(), "with \"quotes\"\nand lines");
+    EXPECT_EQ(back->FindProperty("a time").Get<FbxTime>().Get(), 123456789012345);
+    EXPECT_EQ(back->FindProperty("an enum").Get<FbxEnum>(), 3);
+    for (FbxProperty property = back->FindProperty("a bool"); property.IsValid();
+         property = back->GetNextProperty(property))
+        EXPECT_TRUE(property.GetFlag(FbxPropertyFlags::eUserDefined)) << property.GetNameAsCStr();
+}
+
+TEST_P(SceneWriting, LeavesOutWhatIsNotToBeSaved) {
+    FbxNode* node = addNode("node");
+    FbxProperty::Create(node, FbxIntDT, "secret").ModifyFlag(FbxPropertyFlags::eNotSavable, true);
+
+    EXPECT_FALSE(childOf(writeAndRead())->FindProperty("secret").IsValid());
+}
+
+TEST_P(SceneWriting, KeepsMaterialsInOrderWithTheirTextures) {
+    FbxNode* node = addNode("node", make<FbxMesh>("mesh"));
+    FbxSurfacePhong* phong = make<FbxSurfacePhong>("phong");
+    phong->Diffuse.Set(FbxDouble3(1, 0.5, 0.25));
+    phong->Shininess.Set(42.0);
+    FbxSurfaceLambert* lambert = make<FbxSurfaceLambert>("lambert");
+    lambert->Ambient.Set(FbxDouble3(0.125, 0, 0));
+    FbxSurfaceMaterial* plain = make<FbxSurfaceMaterial>("plain");
+    plain->ShadingModel.Set("toon");
+    for (FbxSurfaceMaterial* material :
+         {static_cast<FbxSurfaceMaterial*>(phong), static_cast<FbxSurfaceMaterial*>(lambert), plain})
+        node->AddMaterial(material);
+    FbxFileTexture* texture = make<FbxFileTexture>("texture");
+    texture->SetFileName("/absolute/\"image\".png");
+    texture->SetRelativeFileName("..\\image.png");
+    texture->SetSwapUV(true);
+    texture->SetScale(2, 3);
+    lambert->Diffuse.ConnectSrcObject(texture);
+    FbxVideo* video = make<FbxVideo>("video");
+    video->SetFileName("/absolute/image.png");
+    texture->ConnectSrcObject(video);
+
+    FbxScene* copy = writeAndRead();
+
+    FbxNode* back = childOf(copy);
+    ASSERT_EQ(back->GetMaterialCount(), 3);
+    auto* backPhong = FbxCast<FbxSurfacePhong>(back->GetMaterial(0));
+    auto* backLambert = FbxCast<FbxSurfaceLambert>(back->GetMaterial(1));
+    ASSERT_NE(backPhong, nullptr);
+    ASSERT_NE(backLambert, nullptr);
+    expectVector(backPhong->Diffuse.Get(), 1, 0.5, 0.25);
+    EXPECT_EQ(backPhong->Shininess.Get(), 42.0);
+    expectVector(backLambert->Ambient.Get(), 0.125, 0, 0);
+    EXPECT_STREQ(back->GetMaterial(2)->ShadingModel.Get().Buffer(), "toon");
+    EXPECT_EQ(back->GetMaterial(2)->GetClassId(), FbxSurfaceMaterial::ClassId);
+    auto* backTexture = backLambert->Diffuse.GetSrcObject<FbxFileTexture>();
+    ASSERT_NE(backTexture, nullptr);
+    EXPECT_STREQ(backTexture->GetFileName(), "/absolute/\"image\".png");
+    EXPECT_STREQ(backTexture->GetRelativeFileName(), "..\\image.png");
+    EXPECT_TRUE(backTexture->GetSwapUV());
+    EXPECT_EQ(backTexture->GetScaleV(), 3.0);
+    ASSERT_NE(backTexture->GetSrcObject<FbxVideo>(), nullptr);
+    EXPECT_STREQ(backTexture->GetSrcObject<FbxVideo>()->GetFileName().Buffer(), "/absolute/image.png");
+}
+
+TEST_P(SceneWriting, NeverTakesAMaterialForAnother) {
+    FbxNode* node = addNode("node", make<FbxMesh>("mesh"));
+    FbxSurfaceMaterial* plain = make<FbxSurfaceMaterial>("plain");
+    plain->ShadingModel.Set("Phong");
+    FbxSurfaceLambert* lambert = make<FbxSurfaceLambert>("lambert");
+    lambert->ShadingModel.Set("blinn");
+    node->AddMaterial(plain);
+    node->AddMaterial(lambert);
+
+    FbxNode* back = childOf(writeAndRead());
+
+    ASSERT_EQ(back->GetMaterialCount(), 2);
+    EXPECT_EQ(back->GetMaterial(0)->GetClassId(), FbxSurfaceMaterial::ClassId);
+    EXPECT_EQ(back->GetMaterial(1)->GetClassId(), FbxSurfaceLambert::ClassId);
+}
+
+TEST_P(SceneWriting, WritesTexturesThatNothingUses) {
+    make<FbxFileTexture>("alone")->SetFileName("a.png");
+
+    auto* back = writeAndRead()->GetSrcObject<FbxFileTexture>();
+
+    ASSERT_NE(back, nullptr);
+    EXPECT_STREQ(back->GetName(), "alone");
+}
+
+TEST_P(SceneWriting, KeepsACacheOnItsDeformer) {
+    FbxMesh* mesh = make<FbxMesh>("mesh");
+    addNode("node", mesh);
+    FbxVertexCacheDeformer* deformer = make<FbxVertexCacheDeformer>("deformer");
+    deformer->Channel.Set("points");
+    deformer->Active.Set(false);
+    FbxCache* cache = make<FbxCache>("cache");
+    cache->SetCacheFileFormat(FbxCache::eMayaCache);
+    cache->SetCacheFileName("fpc\\points.xml", "/absolute/fpc/points.xml");
+    deformer->SetCache(cache);
+    mesh->AddDeformer(deformer);
+
+    FbxMesh* back = attributeOf<FbxMesh>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    auto* backDeformer = FbxCast<FbxVertexCacheDeformer>(back->GetDeformer(0));
+    ASSERT_NE(backDeformer, nullptr);
+    EXPECT_STREQ(backDeformer->Channel.Get().Buffer(), "points");
+    EXPECT_FALSE(backDeformer->Active.Get());
+    ASSERT_NE(backDeformer->GetCache(), nullptr);
+    EXPECT_EQ(backDeformer->GetCache()->GetCacheFileFormat(), FbxCache::eMayaCache);
+    FbxString relative, absolute;
+    backDeformer->GetCache()->GetCacheFileName(relative, absolute);
+    EXPECT_STREQ(relative.Buffer(), "fpc\\points.xml");
+    EXPECT_STREQ(absolute.Buffer(), "/absolute/fpc/points.xml");
+}
+
+TEST_P(SceneWriting, KeepsTheSettings) {
+    FbxGlobalSettings& settings = scene->GetGlobalSettings();
+    settings.SetAxisSystem(FbxAxisSystem::MayaZUp);
+    settings.SetOriginalUpAxis(FbxAxisSystem::MayaZUp);
+    settings.SetSystemUnit(FbxSystemUnit::m);
+    settings.SetTimeMode(FbxTime::ePAL);
+    settings.SetTimelineDefaultTimeSpan(FbxTimeSpan(FbxTime(1847446320), FbxTime(184744632000)));
+    scene->GlobalLightSettings().SetAmbientColor(FbxColor(0.25, 0.5, 0.75));
+    scene->GlobalCameraSettings().SetDefaultCamera("Producer Top");
+
+    FbxScene* copy = writeAndRead();
+
+    const FbxGlobalSettings& back = copy->GetGlobalSettings();
+    EXPECT_EQ(back.GetAxisSystem(), FbxAxisSystem::MayaZUp);
+    EXPECT_EQ(back.GetOriginalUpAxis(), 2);
+    EXPECT_EQ(back.GetSystemUnit(), FbxSystemUnit::m);
+    EXPECT_EQ(back.GetTimeMode(), FbxTime::ePAL);
+    FbxTimeSpan span;
+    back.GetTimelineDefaultTimeSpan(span);
+    EXPECT_EQ(span.GetStart().Get(), 1847446320);
+    EXPECT_EQ(span.GetStop().Get(), 184744632000);
+    EXPECT_EQ(copy->GlobalLightSettings().GetAmbientColor(), FbxColor(0.25, 0.5, 0.75));
+    EXPECT_STREQ(copy->GlobalCameraSettings().GetDefaultCamera(), "Producer Top");
+}
+
+TEST_P(SceneWriting, KeepsFogOnlyWhereFilesHaveAPlaceForIt) {
+    FbxGlobalLightSettings& lights = scene->GlobalLightSettings();
+    lights.SetFogEnable(true);
+    lights.SetFogMode(FbxGlobalLightSettings::eExponential);
+    lights.SetFogDensity(0.5);
+    lights.SetFogStart(1.5);
+    lights.SetFogEnd(250.0);
+    lights.SetFogColor(FbxColor(0.1, 0.2, 0.3, 0.4));
+
+    FbxScene* copy = writeAndRead();
+
+    const FbxGlobalLightSettings& back = copy->GlobalLightSettings();
+    if (GetParam().hasIds()) {
+        EXPECT_FALSE(back.GetFogEnable());
+        EXPECT_EQ(back.GetFogEnd(), 1000.0);
+        return;
+    }
+    EXPECT_TRUE(back.GetFogEnable());
+    EXPECT_EQ(back.GetFogMode(), FbxGlobalLightSettings::eExponential);
+    EXPECT_EQ(back.GetFogDensity(), 0.5);
+    EXPECT_EQ(back.GetFogStart(), 1.5);
+    EXPECT_EQ(back.GetFogEnd(), 250.0);
+    EXPECT_EQ(back.GetFogColor(), FbxColor(0.1, 0.2, 0.3, 0.4));
+}
+
+TEST_P(SceneWriting, KeepsProducerCamerasOnlyWhereFilesHaveAPlaceForThem) {
+    scene->GlobalCameraSettings().CreateProducerCameras();
+    scene->GlobalCameraSettings().GetCameraProducerTop()->FarPlane.Set(777.0);
+    addNode("own", make<FbxCamera>("own"));
+
+    FbxScene* copy = writeAndRead();
+
+    ASSERT_EQ(copy->GetRootNode()->GetChildCount(), 1);
+    EXPECT_STREQ(childOf(copy)->GetName(), "own");
+    FbxGlobalCameraSettings& back = copy->GlobalCameraSettings();
+    if (GetParam().hasIds()) {
+        EXPECT_EQ(back.GetCameraProducerTop(), nullptr);
+        EXPECT_EQ(copy->GetSrcObjectCount<FbxCamera>(), 1);
+        return;
+    }
+    ASSERT_NE(back.GetCameraProducerTop(), nullptr);
+    EXPECT_EQ(back.GetCameraProducerTop()->FarPlane.Get(), 777.0);
+    EXPECT_NE(back.GetCameraProducerPerspective(), nullptr);
+    EXPECT_NE(back.GetCameraProducerBottom(), nullptr);
+    EXPECT_NE(back.GetCameraSwitcher(), nullptr);
+}
+
+TEST_P(SceneWriting, ListsOnlyPropertiesThatDiffer) {
+    addNode("node", make<FbxCamera>("camera"));
+    addNode("other", make<FbxNull>("null"));
+
+    const std::string bytes = write();
+
+    // Once in a template where there are templates, else on each object.
+    std::size_t count = 0;
+    for (std::size_t at = bytes.find("2D Magnifier Zoom"); at != std::string::npos;
+         at = bytes.find("2D Magnifier Zoom", at + 1))
+        ++count;
+    EXPECT_EQ(count, 1U);
+}
+
+TEST_P(SceneWriting, GivesTheSameBytesForTheSameSceneAndTime) {
+    setenv("SOURCE_DATE_EPOCH", "1585690463", 1);
+    addNode("b", make<FbxCamera>("camera"));
+    addNode("a", make<FbxLight>("light"));
+
+    const std::string first = exporting::ExportFixture::write(GetParam(), "first.fbx");
+    const std::string second = exporting::ExportFixture::write(GetParam(), "another name.fbx");
+    FbxScene* const original = scene;
+    scene = read("first.fbx");
+    const std::string again = exporting::ExportFixture::write(GetParam(), "again.fbx");
+    scene = original;
+    unsetenv("SOURCE_DATE_EPOCH");
+
+    EXPECT_TRUE(first == second);
+    EXPECT_TRUE(first == again);
+}
+
+TEST_P(SceneWriting, StatesTheTimeItIsGiven) {
+    setenv("SOURCE_DATE_EPOCH", "1585690463", 1); // 2020-03-31 21:34:23
+
+    const std::string bytes = write();
+
+    unsetenv("SOURCE_DATE_EPOCH");
+    if (GetParam().format == 1) {
+        EXPECT_NE(bytes.find("Year: 2020\n\t\tMonth: 3\n\t\tDay: 31\n\t\tHour: 21\n\t\tMinute: 34\n\t\tSecond: 23"),
+                  std::string::npos);
+    } else {
+        EXPECT_NE(bytes.find("2020-03-31 21:34:23:000"), std::string::npos);
+    }
+    EXPECT_NE(bytes.find("31/03/2020 21:34:23.000"), std::string::npos);
+}
+
+TEST_P(SceneWriting, LeavesTheSceneAsItWas) {
+    FbxNode* node = addNode("node", make<FbxCamera>("camera"));
+    scene->GlobalCameraSettings().CreateProducerCameras();
+    const int members = scene->GetSrcObjectCount();
+    const int nodes = scene->GetNodeCount();
+
+    write();
+
+    EXPECT_EQ(scene->GetSrcObjectCount(), members);
+    EXPECT_EQ(scene->GetNodeCount(), nodes);
+    EXPECT_EQ(node->GetParent(), scene->GetRootNode());
+}
+
+TEST_P(SceneWriting, WritesNodesThatHangNowhere) {
+    make<FbxNode>("adrift");
+
+    FbxScene* copy = writeAndRead();
+
+    ASSERT_EQ(copy->GetRootNode()->GetChildCount(), 1); // readers put them below the root
+    EXPECT_STREQ(childOf(copy)->GetName(), "adrift");
+}
+
+TEST_P(SceneWriting, WritesATreeOfAThousandLevels) {
+    FbxNode* parent = scene->GetRootNode();
+    for (int i = 0; i < 1000; ++i) {
+        FbxNode* node = make<FbxNode>("n");
+        parent->AddChild(node);
+        parent = node;
+    }
+
+    FbxScene* copy = writeAndRead();
+
+    int depth = 0;
+    for (FbxNode* node = copy->GetRootNode(); node->GetChildCount() > 0; node = node->GetChild(0))
+        ++depth;
+    EXPECT_EQ(depth, 1000);
+}
+
+} // namespace
