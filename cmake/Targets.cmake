@@ -58,13 +58,18 @@ function(tarnell_precompile_test_headers name)
   target_precompile_headers(${name} REUSE_FROM test_headers)
 endfunction()
 
-# tarnell_test(NAME FOLDER folder LINK target...): every *Test.cpp below the folder becomes one executable.
+# tarnell_test(NAME FOLDER folder [DEEP] LINK target...): every *Test.cpp of the folder becomes one executable;
+# with DEEP those of its subfolders, too.
 # tarnell_test(NAME SOURCES file... LINK target...): these files do.
 function(tarnell_test name)
-  cmake_parse_arguments(ARG "" "FOLDER" "LINK;SOURCES" ${ARGN})
+  cmake_parse_arguments(ARG "DEEP" "FOLDER" "LINK;SOURCES" ${ARGN})
   set(sources ${ARG_SOURCES})
   if(ARG_FOLDER)
-    file(GLOB_RECURSE sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/${ARG_FOLDER}/*Test.cpp")
+    set(glob GLOB)
+    if(ARG_DEEP)
+      set(glob GLOB_RECURSE)
+    endif()
+    file(${glob} sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/${ARG_FOLDER}/*Test.cpp")
   endif()
   if(NOT sources)
     return()

@@ -44,6 +44,38 @@ class IncludeDirection(unittest.TestCase):
             for include in ('"TnFbxTime.h"', "<FbxSdk.h>", '"model/FrameArithmetic.h"', '"Fbx.h"'):
                 self.assertTrue(self.check(file, f"#include {include}\n"), (file, include))
 
+    def check_rooms(self, files):
+        files["fbxsdk/CMakeLists.txt"] = ("tarnell_room(core LIBRARIES Threads::Threads)\ntarnell_room(object NEEDS core)\n"
+                                          "tarnell_room(document NEEDS core)\n"
+                                          "tarnell_room(scene NEEDS object document)\n")
+        with tempfile.TemporaryDirectory() as folder:
+            for file, source in files.items():
+                path = Path(folder) / file
+                path.parent.mkdir(parents=True, exist_ok=True)
+                path.write_text(source, encoding="utf-8")
+            return violations(Path(folder))
+
+    def test_refuses_a_room_that_is_not_needed(self):
+        for file, include in (("fbxsdk/src/object/ObjectData.cpp", '"scene/SceneData.h"'),
+                              ("fbxsdk/src/object/ObjectData.h", '"document/Document.h"'),
+                              ("fbxsdk/src/core/deep/Time.cpp", '"object/ObjectData.h"'),
+                              ("fbxsdk/src/object/ObjectData.cpp", "<fbxsdk/FbxNode.h>"),
+                              ("fbxsdk/include/fbxsdk/FbxObject.h", "<fbxsdk/FbxNode.h>")):
+            found = self.check_rooms({"fbxsdk/src/scene/FbxNode.cpp": "", "fbxsdk/src/object/FbxObject.cpp": "",
+                                      file: f"\n#include {include}\n"})
+            self.assertEqual(len(found), 1, (file, include, found))
+            self.assertTrue(found[0].startswith(f"{file}:2: {include}"), found)
+
+    def test_lets_rooms_use_what_they_need_and_what_that_needs(self):
+        found = self.check_rooms({"fbxsdk/src/object/FbxObject.cpp": '#include "core/Time.h"\n',
+                                  "fbxsdk/src/scene/FbxNode.cpp": '#include <fbxsdk/FbxObject.h>\n#include "core/Time.h"\n'
+                                                                  '#include "document/Document.h"\n'})
+        self.assertEqual(found, [])
+
+    def test_refuses_a_public_header_of_no_room(self):
+        found = self.check_rooms({"fbxsdk/include/fbxsdk/FbxNew.h": ""})
+        self.assertEqual(len(found), 1, found)
+
     def test_names_file_and_line(self):
         found = self.check("src/model/TnFbxMesh.cpp", "// mesh\n\n#  include <fbxsdk.h>\n")
 
@@ -56,7 +88,7 @@ class IncludeDirection(unittest.TestCase):
             ("src/model/TnFbxMesh.cpp", '// #include <fbxsdk.h>\n/*\n#include "Fbx.h"\n*/\n#include "ChannelSet.h"\n'),
             ("src/sdk/SdkContext.cpp", '#include "FbxSdk.h"\n#include <fbxsdk.h>\n#include "model/FrameArithmetic.h"\n'),
             ("src/Fbx.cpp", '#include "Fbx.h"\n#include "sdk/SdkContext.h"\n'),
-            ("fbxsdk/src/scene/Node.cpp", '#include <fbxsdk/FbxTime.h>\n#include "core/Strings.h"\n'),
+            ("fbxsdk/src/scene/FbxNode.cpp", '#include <fbxsdk/FbxTime.h>\n#include "core/Strings.h"\n'),
         ):
             self.assertEqual(self.check(file, source), [], file)
 

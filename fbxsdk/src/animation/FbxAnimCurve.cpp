@@ -8,7 +8,6 @@
 #include <cmath>
 
 #include <fbxsdk/FbxAnimCurveNode.h>
-#include <fbxsdk/FbxScene.h>
 
 #include "animation/CurveEvaluation.h"
 #include "object/ManagerData.h"
@@ -25,10 +24,6 @@ FbxAnimCurve::FbxAnimCurve(FbxManager& pManager, const detail::ClassInfo& pInfo)
     : FbxAnimCurveBase(pManager, pInfo), mKeys(std::make_unique<detail::CurveKeys>()),
       mCursor(std::make_unique<detail::CurveCursor>()) {}
 FbxAnimCurve::~FbxAnimCurve() = default;
-
-FbxAnimCurve* FbxAnimCurve::Create(FbxScene* pContainer, const char* pName) {
-    return Create(static_cast<FbxObject*>(pContainer), pName);
-}
 
 namespace {
 

@@ -8,10 +8,8 @@
 #include <iterator>
 
 #include <fbxsdk/FbxAnimCurve.h>
-#include <fbxsdk/FbxScene.h>
 
 #include "object/ManagerData.h"
-#include "object/PropertyTypes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 
@@ -23,60 +21,10 @@ FbxAnimCurveNode::~FbxAnimCurveNode() = default;
 
 namespace {
 
-/// The channels of a property: as many as it holds numbers, up to four; none for text and references.
-int channelCount(EFbxType type) {
-    switch (type) {
-    case eFbxUndefined:
-    case eFbxDouble4x4:
-    case eFbxString:
-    case eFbxTime:
-    case eFbxReference:
-    case eFbxBlob:
-    case eFbxDateTime:
-    case eFbxEnumM:
-    case eFbxTypeCount:
-        return 0;
-    default:
-        return static_cast<int>(detail::componentCount(type));
-    }
-}
-
 /// So many channels are searched one by one; more get an index.
 constexpr std::size_t kSearchedChannels = 8;
 
-/// Files call the curve nodes of the three transform properties by a letter.
-const char* curveNodeName(const char* propertyName) {
-    constexpr struct {
-        std::string_view property;
-        const char* node;
-    } kNames[] = {{"Lcl Translation", "T"}, {"Lcl Rotation", "R"}, {"Lcl Scaling", "S"}};
-    for (const auto& row : kNames) {
-        if (row.property == propertyName)
-            return row.node;
-    }
-    return propertyName;
-}
-
 } // namespace
-
-FbxAnimCurveNode* FbxAnimCurveNode::CreateTypedCurveNode(FbxProperty& pProperty, FbxScene* pScene) {
-    if (!pProperty.IsValid())
-        return nullptr;
-    const int count = channelCount(pProperty.GetPropertyDataType().GetType());
-    if (count == 0)
-        return nullptr;
-    const char* name = curveNodeName(pProperty.GetNameAsCStr());
-    FbxAnimCurveNode* node = pScene ? Create(pScene, name) : Create(pProperty.GetFbxObject()->GetFbxManager(), name);
-    if (count == 1) {
-        node->addChannel(pProperty.GetNameAsCStr(), pProperty.Get<FbxDouble>());
-        return node;
-    }
-    const FbxDouble4 value = pProperty.Get<FbxDouble4>();
-    constexpr const char* kComponents[] = {"X", "Y", "Z", "W"};
-    for (int i = 0; i < count; ++i)
-        node->addChannel(kComponents[i], value[i]);
-    return node;
-}
 
 unsigned int FbxAnimCurveNode::GetChannelsCount() const { return static_cast<unsigned int>(mChannels.size()); }
 
@@ -114,7 +62,7 @@ FbxAnimCurve* FbxAnimCurveNode::GetCurve(unsigned int pChannelId, unsigned int p
 FbxAnimCurve* FbxAnimCurveNode::CreateCurve(const char* pCurveNodeName, unsigned int pChannelId) {
     if (pChannelId >= mChannels.size())
         return nullptr;
-    FbxScene* scene = GetScene();
+    FbxObject* const scene = data().membership ? &data().membership->scene : nullptr;
     FbxAnimCurve* curve =
         scene ? FbxAnimCurve::Create(scene, pCurveNodeName) : FbxAnimCurve::Create(GetFbxManager(), pCurveNodeName);
     ConnectToChannel(curve, pChannelId);

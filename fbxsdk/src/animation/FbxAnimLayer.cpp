@@ -4,9 +4,6 @@
 // Animation layers: how a layer combines with those below, and the curve nodes that belong to it.
 #include <fbxsdk/FbxAnimLayer.h>
 
-#include <fbxsdk/FbxAnimCurveNode.h>
-#include <fbxsdk/FbxScene.h>
-
 #include "object/ManagerData.h"
 #include "schema/Schema.h"
 
@@ -51,18 +48,6 @@ bool FbxAnimLayer::GetBlendModeBypass(EFbxType pType) const {
     if (bit < 0 || bit >= eFbxTypeCount)
         return false;
     return (FindProperty("BlendModeBypass").Get<FbxULongLong>() >> bit & 1U) != 0;
-}
-
-FbxAnimCurveNode* FbxAnimLayer::CreateCurveNode(FbxProperty& pProperty) {
-    if (FbxAnimCurveNode* existing = pProperty.GetCurveNode(this, false))
-        return existing;
-    // What a host keys is kept, whatever the flags say: films and planes of cameras are not marked as animatable.
-    FbxAnimCurveNode* node = FbxAnimCurveNode::CreateTypedCurveNode(pProperty, GetScene());
-    if (!node)
-        return nullptr;
-    AddMember(node);
-    pProperty.ConnectSrcObject(node);
-    return node;
 }
 
 FBXSDK_NAMESPACE_END

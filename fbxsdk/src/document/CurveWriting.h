@@ -6,7 +6,7 @@
 
 #include "container/RecordSink.h"
 #include "document/Document.h"
-#include "document/VersionTraits.h"
+#include "schema/VersionTraits.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

@@ -13,7 +13,7 @@
 #include "container/FileId.h"
 #include "container/RecordSink.h"
 #include "document/Document.h"
-#include "document/VersionTraits.h"
+#include "schema/VersionTraits.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

@@ -6,6 +6,7 @@
 
 #include <fbxsdk/FbxBlendShape.h>
 #include <fbxsdk/FbxBlendShapeChannel.h>
+#include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxSkin.h>
 #include <fbxsdk/FbxVertexCacheDeformer.h>
 
@@ -103,5 +104,7 @@ void FbxGeometry::connectionChanged(FbxObject& pSource, FbxObject& pDestination,
     if (&pDestination == this)
         detail::followConnection(mDeformers, pSource, pConnected);
 }
+
+FbxGeometry* FbxNode::GetGeometry() { return FbxCast<FbxGeometry>(GetNodeAttribute()); }
 
 FBXSDK_NAMESPACE_END

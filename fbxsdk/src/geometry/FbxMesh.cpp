@@ -4,6 +4,8 @@
 // Polygons, and what layer 0 holds for their corners.
 #include <fbxsdk/FbxMesh.h>
 
+#include <fbxsdk/FbxNode.h>
+
 #include "geometry/GeometryReading.h"
 #include "geometry/ItemReading.h"
 #include "geometry/LayerReading.h"
@@ -157,5 +159,7 @@ void FbxMesh::ReservePolygonVertexCount(int pCount) {
     detachSource();
     mPolygonVertices.reserve(pCount);
 }
+
+FbxMesh* FbxNode::GetMesh() { return FbxCast<FbxMesh>(GetNodeAttribute()); }
 
 FBXSDK_NAMESPACE_END

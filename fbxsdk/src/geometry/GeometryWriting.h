@@ -11,7 +11,7 @@
 #include <fbxsdk/FbxShape.h>
 
 #include "container/RecordSink.h"
-#include "document/VersionTraits.h"
+#include "schema/VersionTraits.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

@@ -50,7 +50,7 @@ bool FbxExporter::Initialize(const char* pFileName, int pFileFormat, FbxIOSettin
     mFileFormat = -1;
     if (!FbxIOBase::Initialize(pFileName, pFileFormat, pIOSettings))
         return false;
-    const int writer = writerOf(GetFbxManager()->data().registry, pFileName, pFileFormat);
+    const int writer = writerOf(*GetFbxManager()->GetIOPluginRegistry(), pFileName, pFileFormat);
     if (writer < 0) {
         mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: there is no writer number %d", pFileName, pFileFormat);
         return false;
@@ -155,7 +155,7 @@ bool FbxExporter::Export(FbxDocument* pDocument, bool) {
         return false;
     }
     const VersionTraits* const chosen = findVersion(mVersion);
-    const bool binary = mFileFormat == GetFbxManager()->data().registry.GetNativeWriterFormat();
+    const bool binary = mFileFormat == GetFbxManager()->GetIOPluginRegistry()->GetNativeWriterFormat();
     try {
         return detail::faultToStatus(
             mStatus, [&] { return writeFile(*scene, mFileName, chosen ? *chosen : kNewestVersion, binary, mStatus); });
@@ -178,7 +178,7 @@ bool FbxExporter::SetFileExportVersion(FbxString pVersion, FbxSceneRenamer::ERen
 
 char const* const* FbxExporter::GetCurrentWritableVersions() const {
     // All writers write the same versions, so the answer does not depend on the format chosen.
-    const FbxIOPluginRegistry& registry = GetFbxManager()->data().registry;
+    const FbxIOPluginRegistry& registry = *GetFbxManager()->GetIOPluginRegistry();
     return registry.GetWritableVersions(registry.GetNativeWriterFormat());
 }
 

@@ -9,10 +9,12 @@
 #include <cstring>
 #include <iterator>
 
+#include <fbxsdk/FbxManager.h>
 #include <fbxsdk/FbxString.h>
 
 #include "container/Record.h"
-#include "document/VersionTraits.h"
+#include "object/ManagerData.h"
+#include "schema/VersionTraits.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace {
@@ -90,6 +92,12 @@ int FbxIOPluginRegistry::FindWriterIDByExtension(const char* pExtension) const {
 
 char const* const* FbxIOPluginRegistry::GetWritableVersions(int pFileFormat) const {
     return formatAt(pFileFormat) ? kVersions.data() : nullptr;
+}
+
+FbxIOPluginRegistry* FbxManager::GetIOPluginRegistry() const {
+    if (!mData->registry)
+        mData->registry = std::make_shared<FbxIOPluginRegistry>();
+    return mData->registry.get();
 }
 
 FBXSDK_NAMESPACE_END

@@ -4,6 +4,7 @@
 // Importers.
 #include <fbxsdk/FbxImporter.h>
 
+#include <fbxsdk/FbxIOPluginRegistry.h>
 #include <fbxsdk/FbxScene.h>
 
 #include "container/FileBytes.h"
@@ -69,7 +70,7 @@ bool FbxImporter::Initialize(const char* pFileName, int pFileFormat, FbxIOSettin
     mHeader = {};
     if (!FbxIOBase::Initialize(pFileName, pFileFormat, pIOSettings))
         return false;
-    if (pFileFormat < -1 || pFileFormat >= GetFbxManager()->data().registry.GetReaderFormatCount()) {
+    if (pFileFormat < -1 || pFileFormat >= GetFbxManager()->GetIOPluginRegistry()->GetReaderFormatCount()) {
         mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: there is no reader number %d", pFileName, pFileFormat);
         return false;
     }

@@ -24,10 +24,9 @@
 #include "geometry/DeformerReading.h"
 #include "geometry/GeometryReading.h"
 #include "io/PropertyReading.h"
+#include "io/SchemaClass.h"
 #include "object/ManagerData.h"
-#include "schema/Schema.h"
-#include "schema/ShadingLetters.h"
-#include "schema/SubClassNames.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -50,7 +49,7 @@ std::string textOf(const Value& value) { return std::string(value.toText()); }
 void readNode(const Reading& reading) {
     auto& node = reading.as<FbxNode>();
     if (const char letter = reading.record("Shading").toLetter())
-        node.SetShadingMode(shadingModeOf(letter));
+        node.SetShadingMode(static_cast<FbxNode::EShadingMode>(numberOf(kShadingModes, letter, FbxNode::eHardShading)));
     // A file whose class defaults and objects both leave the flag out means its rotations to be in force.
     const bool stated = reading.source.property("RotationActive") != nullptr ||
                         std::any_of(reading.document->templates.begin(), reading.document->templates.end(),
@@ -75,17 +74,13 @@ void readCamera(const Reading& reading) {
 }
 
 void readSkeleton(const Reading& reading) {
-    for (const auto& row : kSkeletonSubClasses) {
-        if (row.subClass == reading.source.subClass)
-            reading.as<FbxSkeleton>().SetSkeletonType(row.type);
-    }
+    const int type = numberOf(kSkeletonTypes, reading.source.subClass, FbxSkeleton::eLimbNode);
+    reading.as<FbxSkeleton>().SetSkeletonType(static_cast<FbxSkeleton::EType>(type));
 }
 
 void readMarker(const Reading& reading) {
-    for (const auto& row : kMarkerSubClasses) {
-        if (row.subClass == reading.source.subClass)
-            reading.as<FbxMarker>().SetType(row.type);
-    }
+    const int type = numberOf(kMarkerTypes, reading.source.subClass, FbxMarker::eStandard);
+    reading.as<FbxMarker>().SetType(static_cast<FbxMarker::EType>(type));
 }
 
 /// The channels of a curve node are its properties "d|X", "d|Y", … or "d|<property name>".

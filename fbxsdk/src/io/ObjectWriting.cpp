@@ -31,8 +31,7 @@
 #include "geometry/GeometryWriting.h"
 #include "io/PropertyWriting.h"
 #include "object/SceneMembers.h"
-#include "schema/ShadingLetters.h"
-#include "schema/SubClassNames.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -40,9 +39,9 @@ namespace {
 
 std::string_view writtenSubClass(const FbxObject& object, const SchemaClass& schema) {
     if (const auto* skeleton = FbxCast<FbxSkeleton>(&object))
-        return subClassOf(skeleton->GetSkeletonType());
+        return spellingOf(kSkeletonTypes, skeleton->GetSkeletonType(), FbxSkeleton::eLimbNode);
     if (const auto* marker = FbxCast<FbxMarker>(&object))
-        return subClassOf(marker->GetType());
+        return spellingOf(kMarkerTypes, marker->GetType(), FbxMarker::eStandard);
     return schema.subClass == kAnySubClass ? std::string_view() : schema.subClass;
 }
 
@@ -87,7 +86,7 @@ void writeNode(const Writing& writing) {
             if (hidden)
                 writeText(sink, "Hidden", "True");
         }
-        writeLetter(sink, "Shading", shadingLetterOf(node.GetShadingMode()));
+        writeLetter(sink, "Shading", spellingOf(kShadingModes, node.GetShadingMode(), FbxNode::eHardShading));
         writeText(sink, "Culling", "CullingOff");
     };
 }

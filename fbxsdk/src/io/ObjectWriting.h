@@ -5,7 +5,7 @@
 #pragma once
 
 #include "document/WritableDocument.h"
-#include "schema/Schema.h"
+#include "io/SchemaClass.h"
 
 FBXSDK_NAMESPACE_BEGIN
 class FbxNodeAttribute;

@@ -11,7 +11,7 @@
 #include <fbxsdk/FbxObject.h>
 
 #include "object/ObjectData.h"
-#include "object/PropertyTypes.h"
+#include "schema/PropertyTypes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

@@ -10,8 +10,8 @@
 
 #include <fbxsdk/FbxAnimCurveNode.h>
 
-#include "object/PropertyTypes.h"
 #include "scene/IdleCurveNode.h"
+#include "schema/PropertyTypes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

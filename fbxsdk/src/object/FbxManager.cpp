@@ -4,9 +4,6 @@
 // Managers and the life of objects.
 #include <fbxsdk/FbxManager.h>
 
-#include <fbxsdk/FbxIOPluginRegistry.h>
-#include <fbxsdk/FbxIOSettings.h>
-
 #include "object/ManagerData.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -20,8 +17,6 @@ void FbxManager::Destroy() {
     mData->destroyAll();
     delete this;
 }
-
-FbxIOPluginRegistry* FbxManager::GetIOPluginRegistry() const { return &mData->registry; }
 
 FbxIOSettings* FbxManager::GetIOSettings() const { return mData->settings; }
 
@@ -57,7 +52,7 @@ void ManagerData::enter(FbxObject& object) {
 void ManagerData::leave(FbxObject& object) {
     if (tearingDown)
         return;
-    if (static_cast<FbxObject*>(settings) == &object)
+    if (static_cast<const void*>(settings) == &object)
         settings = nullptr;
     const std::size_t slot = object.mData->managerSlot;
     objects[slot] = objects.back();

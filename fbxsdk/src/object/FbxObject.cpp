@@ -7,11 +7,8 @@
 #include <unordered_set>
 #include <vector>
 
-#include <fbxsdk/FbxScene.h>
-
 #include "object/ManagerData.h"
 #include "object/ObjectData.h"
-#include "scene/SceneData.h"
 
 FBXSDK_NAMESPACE_BEGIN
 
@@ -42,14 +39,13 @@ namespace {
 
 /// What every scene has goes with the scene only.
 bool isKeptByScene(const FbxObject& object) {
-    const FbxScene* scene = object.GetScene();
-    return scene && scene != &object && scene->sceneData().isFixed(object);
+    return object.GetScene() && !detail::isScene(object) && object.data().membership->isFixed(object);
 }
 
 } // namespace
 
 void FbxObject::Destroy(bool pRecursive) {
-    if (!pRecursive && !Is<FbxScene>()) {
+    if (!pRecursive && !detail::isScene(*this)) {
         // Takes nothing along, and no memory: whoever is done with an object can rely on it.
         FbxObject* const alone = this;
         if (!isKeptByScene(*this))
@@ -59,14 +55,14 @@ void FbxObject::Destroy(bool pRecursive) {
     std::vector<FbxObject*> doomed;
     std::unordered_set<const FbxObject*> known;
     const auto doom = [&](FbxObject& object) {
-        const bool isKept = isKeptByScene(object) && !known.contains(object.GetScene());
+        const bool isKept = isKeptByScene(object) && !known.contains(&object.data().membership->scene);
         if (!isKept && known.insert(&object).second)
             doomed.push_back(&object);
     };
     doom(*this);
     for (std::size_t i = 0; i < doomed.size(); ++i) { // NOLINT(modernize-loop-convert): the list grows
         // A scene takes its members along, and its members are its sources.
-        const auto* scene = FbxCast<FbxScene>(doomed[i]);
+        const FbxScene* scene = detail::isScene(*doomed[i]) ? doomed[i]->GetScene() : nullptr;
         for (const detail::ConnectionPoint* source : doomed[i]->mData->plug.sources) {
             if (source->property < 0 && (pRecursive || (scene && source->object->GetScene() == scene)))
                 doom(*source->object);
@@ -84,8 +80,6 @@ void FbxObject::SetName(const char* pName) { mData->name = pName ? pName : ""; }
 FbxManager* FbxObject::GetFbxManager() const { return mData->manager; }
 
 FbxScene* FbxObject::GetScene() const { return mData->scene; }
-
-FbxDocument* FbxObject::GetDocument() const { return mData->scene; }
 
 FbxProperty FbxObject::FindProperty(const char* pName, bool pCaseSensitive) const {
     const int index = pName ? mData->findProperty(pName, pCaseSensitive) : -1;

@@ -5,17 +5,19 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <span>
 #include <vector>
 
-#include <fbxsdk/FbxIOPluginRegistry.h>
 #include <fbxsdk/FbxManager.h>
 
 #include "object/ObjectData.h"
-#include "scene/NodeEvaluation.h"
 
 FBXSDK_NAMESPACE_BEGIN
+class FbxIOPluginRegistry;
 namespace detail {
+
+class EvaluationBudget;
 
 class ManagerData {
 public:
@@ -46,11 +48,12 @@ public:
 
     std::vector<FbxObject*> objects;
     bool tearingDown = false;
+    FbxIOSettings* settings = nullptr; ///< an object, which may be freed first
     /// Grows with every change of a value, a key or a connection; evaluation caches compare it.
     std::uint64_t revision = 0;
-    EvaluationBudget evaluationBudget;
-    FbxIOPluginRegistry registry;
-    FbxIOSettings* settings = nullptr;
+    // What higher rooms keep per manager; they make it when they first ask for it.
+    std::shared_ptr<EvaluationBudget> evaluationBudget;
+    std::shared_ptr<FbxIOPluginRegistry> registry;
 };
 
 } // namespace detail

@@ -7,11 +7,7 @@
 #include <algorithm>
 #include <cstring>
 
-#include <fbxsdk/FbxNode.h>
-#include <fbxsdk/FbxScene.h>
-
 #include "object/ManagerData.h"
-#include "scene/SceneData.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -130,7 +126,15 @@ bool isConnected(const ConnectionPoint& source, const ConnectionPoint& destinati
     return byEnds ? source.destinations.contains(destination) : destination.sources.contains(source);
 }
 
-void joinScene(FbxObject& object, FbxScene& scene) {
+bool isScene(const FbxObject& object) {
+    const Membership* membership = object.data().membership;
+    return membership && &membership->scene == &object;
+}
+
+void joinSceneOf(const FbxObject& member, FbxObject& object) {
+    FbxScene* const scene = member.data().scene;
+    Membership& membership = *member.data().membership;
+    ConnectionPoint& scenePlug = membership.scene.data().plug;
     std::vector<FbxObject*> pending{&object};
     while (!pending.empty()) {
         FbxObject* each = pending.back();
@@ -138,13 +142,14 @@ void joinScene(FbxObject& object, FbxScene& scene) {
         // A scene is a member of itself alone.
         if (each->GetScene())
             continue;
-        each->data().scene = &scene;
-        scene.sceneData().enter(*each);
-        if (!isConnected(each->data().plug, scene.data().plug)) {
-            ObjectData::link(each->data().plug, scene.data().plug);
-            ObjectData::announce(*each, scene, true);
+        each->data().scene = scene;
+        each->data().membership = &membership;
+        membership.enter(*each);
+        if (!isConnected(each->data().plug, scenePlug)) {
+            ObjectData::link(each->data().plug, scenePlug);
+            ObjectData::announce(*each, membership.scene, true);
         }
-        each->data().announceScene(&scene);
+        each->data().announceScene(scene);
         // What feeds a member is a member. Pushed in reverse, so that the first source enters first.
         const auto pushSources = [&](const ConnectionPoint& point) {
             const auto& sources = point.sources.all();
@@ -158,8 +163,9 @@ void joinScene(FbxObject& object, FbxScene& scene) {
 }
 
 void leaveScene(FbxObject& object) {
-    object.data().scene->sceneData().leave(object);
+    object.data().membership->leave(object);
     object.data().scene = nullptr;
+    object.data().membership = nullptr;
     object.data().announceScene(nullptr);
 }
 
@@ -185,8 +191,8 @@ bool ObjectData::connect(ConnectionPoint& source, ConnectionPoint& destination) 
         return false;
     link(source, destination);
     noteChange(to);
-    if (FbxScene* scene = to.GetScene())
-        joinScene(from, *scene);
+    if (to.GetScene())
+        joinSceneOf(to, from);
     if (!betweenObjects(source, destination))
         return true;
     announce(from, to, true);
@@ -198,8 +204,8 @@ bool ObjectData::disconnect(ConnectionPoint& source, ConnectionPoint& destinatio
         return false;
     FbxObject& from = *source.object;
     FbxObject& to = *destination.object;
-    const bool leaves = from.GetScene() == &to && betweenObjects(source, destination);
-    if (leaves && from.GetScene()->sceneData().isFixed(from))
+    const bool leaves = isScene(to) && from.GetScene() == to.GetScene() && betweenObjects(source, destination);
+    if (leaves && from.data().membership->isFixed(from))
         return false;
     source.destinations.remove(destination);
     destination.sources.remove(source);

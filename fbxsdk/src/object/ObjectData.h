@@ -16,22 +16,13 @@
 #include <unordered_map>
 #include <vector>
 
-#include <fbxsdk/FbxDataType.h>
 #include <fbxsdk/FbxObject.h>
 
 #include "object/ConnectionList.h"
+#include "schema/PropertyRow.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
-
-/// One property of a class: a line of the class's property template.
-struct PropertyRow {
-    const char* name;
-    const FbxDataType* type;
-    const char* flags; ///< as in files: "A" animatable, "H" hidden, "U" user-defined
-    std::array<double, 4> numbers{};
-    const char* text = "";
-};
 
 /// One class of objects. The rows are the whole list of the class, inherited ones included, in file order.
 struct ClassInfo {
@@ -67,10 +58,30 @@ struct PropertyData {
     const PropertyRow* row = nullptr; ///< null for dynamic ones
 };
 
+/// What a scene does for its members.
+class Membership {
+public:
+    explicit Membership(FbxObject& owner) : scene(owner) {}
+    Membership(const Membership&) = delete;
+    Membership& operator=(const Membership&) = delete;
+
+    /// Keeps the scene's lists in step when an object becomes a member or stops being one.
+    virtual void enter(FbxObject& member) = 0;
+    virtual void leave(FbxObject& member) = 0;
+    /// Whether the object is one that every scene has: it stays as long as the scene.
+    [[nodiscard]] virtual bool isFixed(const FbxObject& member) const = 0;
+
+    FbxObject& scene;
+
+protected:
+    ~Membership() = default;
+};
+
 struct ObjectData {
     const ClassInfo* info = nullptr;
     FbxManager* manager = nullptr;
-    FbxScene* scene = nullptr;
+    FbxScene* scene = nullptr;        ///< null outside of scenes; a scene is a member of itself
+    Membership* membership = nullptr; ///< of the same scene
     std::string name;
     ConnectionPoint plug;
     std::size_t managerSlot = 0;                           ///< place in the manager's list
@@ -113,8 +124,9 @@ inline constexpr int kRootProperty = -1;
 [[nodiscard]] PropertyValue defaultValue(const PropertyRow& row);
 [[nodiscard]] unsigned defaultFlags(const PropertyRow& row);
 [[nodiscard]] bool isConnected(const ConnectionPoint& source, const ConnectionPoint& destination);
-/// Makes the object, and everything that feeds it, a member of the scene; those in a scene already stay there.
-void joinScene(FbxObject& object, FbxScene& scene);
+[[nodiscard]] bool isScene(const FbxObject& object);
+/// Makes the object, and everything that feeds it, a member of the member's scene; those in a scene already stay there.
+void joinSceneOf(const FbxObject& member, FbxObject& object);
 /// Ends the object's membership. What feeds it stays: it is a source of the scene in its own right.
 void leaveScene(FbxObject& object);
 

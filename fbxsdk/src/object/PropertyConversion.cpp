@@ -19,7 +19,7 @@
 #include <fbxsdk/FbxString.h>
 #include <fbxsdk/FbxTime.h>
 
-#include "object/PropertyTypes.h"
+#include "schema/PropertyTypes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

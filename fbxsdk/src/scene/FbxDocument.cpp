@@ -20,4 +20,6 @@ FbxDocument::FbxDocument(FbxManager& pManager, const detail::ClassInfo& pInfo)
       ActiveAnimStackName(detail::bindProperty<FbxString>(*this, "ActiveAnimStackName")) {}
 FbxDocument::~FbxDocument() = default;
 
+FbxDocument* FbxObject::GetDocument() const { return mData->scene; }
+
 FBXSDK_NAMESPACE_END

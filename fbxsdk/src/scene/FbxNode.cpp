@@ -9,15 +9,14 @@
 #include <string_view>
 
 #include <fbxsdk/FbxCamera.h>
-#include <fbxsdk/FbxGeometry.h>
 #include <fbxsdk/FbxLight.h>
 #include <fbxsdk/FbxMarker.h>
-#include <fbxsdk/FbxMesh.h>
 #include <fbxsdk/FbxNull.h>
 #include <fbxsdk/FbxSkeleton.h>
 #include <fbxsdk/FbxSurfaceMaterial.h>
 
 #include "object/ManagerData.h"
+#include "scene/NodeEvaluation.h"
 #include "scene/NodePivots.h"
 #include "scene/NodeTree.h"
 #include "schema/Schema.h"
@@ -97,11 +96,9 @@ FbxNode::FbxNode(FbxManager& pManager, const detail::ClassInfo& pInfo)
       Visibility(propertyOf(*this, nodeRows().visibility)) {}
 
 FbxNode::~FbxNode() {
-    if (!mEvaluation)
-        return;
     detail::ManagerData& manager = GetFbxManager()->data();
-    if (!manager.tearingDown)
-        manager.evaluationBudget.release(*mEvaluation);
+    if (mEvaluation && manager.evaluationBudget && !manager.tearingDown)
+        manager.evaluationBudget->release(*mEvaluation);
 }
 
 detail::NodeEvaluation& FbxNode::evaluation() {
@@ -214,13 +211,11 @@ FbxNodeAttribute* FbxNode::GetNodeAttributeByIndex(int pIndex) { return at(mAttr
 
 const FbxNodeAttribute* FbxNode::GetNodeAttributeByIndex(int pIndex) const { return at(mAttributes, pIndex); }
 
-FbxMesh* FbxNode::GetMesh() { return FbxCast<FbxMesh>(GetNodeAttribute()); }
 FbxCamera* FbxNode::GetCamera() { return FbxCast<FbxCamera>(GetNodeAttribute()); }
 FbxLight* FbxNode::GetLight() { return FbxCast<FbxLight>(GetNodeAttribute()); }
 FbxNull* FbxNode::GetNull() { return FbxCast<FbxNull>(GetNodeAttribute()); }
 FbxMarker* FbxNode::GetMarker() { return FbxCast<FbxMarker>(GetNodeAttribute()); }
 FbxSkeleton* FbxNode::GetSkeleton() { return FbxCast<FbxSkeleton>(GetNodeAttribute()); }
-FbxGeometry* FbxNode::GetGeometry() { return FbxCast<FbxGeometry>(GetNodeAttribute()); }
 
 void FbxNode::SetTarget(FbxNode* pNode) { setOnlyNode(propertyOf(*this, nodeRows().target), pNode); }
 

@@ -19,6 +19,7 @@ FBXSDK_OBJECT_IMPLEMENT(FbxScene, FbxDocument, detail::kDocumentRows)
 FbxScene::FbxScene(FbxManager& pManager, const detail::ClassInfo& pInfo)
     : FbxDocument(pManager, pInfo), mSceneData(std::make_unique<detail::SceneData>(*this)) {
     data().scene = this;
+    data().membership = mSceneData.get();
     mSceneData->root = FbxNode::Create(this, "RootNode");
     mSceneData->settings = FbxGlobalSettings::Create(this, "GlobalSettings");
 }

@@ -149,12 +149,22 @@ void bindTransform(FbxNode& node, NodeEvaluation& state) {
     state.animation = moves ? std::make_unique<TransformBinding>(std::move(binding)) : nullptr;
 }
 
+} // namespace
+
+EvaluationBudget& evaluationBudgetOf(ManagerData& manager) {
+    if (!manager.evaluationBudget)
+        manager.evaluationBudget = std::make_shared<EvaluationBudget>();
+    return *manager.evaluationBudget;
+}
+
+namespace {
+
 /// The node's evaluation state, emptied when the scene has changed since it was filled.
 NodeEvaluation& currentState(FbxNode& node) {
     NodeEvaluation& state = node.evaluation();
     ManagerData& manager = node.GetFbxManager()->data();
     if (state.revision != manager.revision) {
-        manager.evaluationBudget.release(state);
+        evaluationBudgetOf(manager).release(state);
         bindTransform(node, state);
         state.revision = manager.revision;
         state.chain = NodeEvaluation::Chain::unknown;
@@ -238,7 +248,7 @@ const GlobalTransform* knownTransform(NodeEvaluation& state, EvaluationBudget& b
 /// Up to the nearest ancestor that knows the answer, then down again. Of nodes that stand still the answer holds for
 /// all times.
 GlobalTransform globalAt(FbxNode& node, const FbxTime& time) {
-    EvaluationBudget& budget = node.GetFbxManager()->data().evaluationBudget;
+    EvaluationBudget& budget = evaluationBudgetOf(node.GetFbxManager()->data());
     NodeEvaluation& asked = stateWithChain(node);
     if (asked.hasStillGlobal)
         return asked.stillGlobal;

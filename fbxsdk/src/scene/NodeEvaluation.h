@@ -22,6 +22,8 @@ FBXSDK_NAMESPACE_BEGIN
 class FbxNode;
 namespace detail {
 
+class ManagerData;
+
 using Vector3 = std::array<double, 3>;
 /// The images of the three axes, as the first rows of an FbxAMatrix hold them.
 using Linear = std::array<Vector3, 3>;
@@ -122,6 +124,9 @@ private:
     std::uint32_t mGeneration = 0; ///< that was given last
     TransformCache mSpare;         ///< of the node that was released last, for the next one: most need as much memory
 };
+
+/// Made when a manager's first node is evaluated.
+[[nodiscard]] EvaluationBudget& evaluationBudgetOf(ManagerData& manager);
 
 /// The node's matrix relative to its parent, at the time (or of the static values at FBXSDK_TIME_INFINITE).
 FbxAMatrix evaluateLocal(FbxNode& node, const FbxTime& time);

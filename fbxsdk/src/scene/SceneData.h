@@ -19,8 +19,8 @@ namespace detail {
 extern const PropertyRow kDocumentTable[1];
 inline constexpr std::span<const PropertyRow> kDocumentRows{kDocumentTable}; ///< of documents and scenes
 
-struct SceneData {
-    explicit SceneData(FbxScene& scene) : lights(scene), cameras(scene), times(scene) {}
+struct SceneData final : Membership {
+    explicit SceneData(FbxScene& owner) : Membership(owner), lights(owner), cameras(owner), times(owner) {}
 
     FbxNode* root = nullptr;
     FbxGlobalSettings* settings = nullptr;
@@ -35,11 +35,9 @@ struct SceneData {
     /// The files that were read into the scene; geometry is read from them on first use.
     std::vector<std::shared_ptr<const Document>> documents;
 
-    /// Keeps the lists in step when an object becomes a member or stops being one.
-    void enter(FbxObject& member);
-    void leave(FbxObject& member);
-    /// Whether the object is one that every scene has: it stays as long as the scene.
-    [[nodiscard]] bool isFixed(const FbxObject& member) const;
+    void enter(FbxObject& member) override;
+    void leave(FbxObject& member) override;
+    [[nodiscard]] bool isFixed(const FbxObject& member) const override;
     /// The name of the file that was read last; empty for a scene made in memory.
     [[nodiscard]] std::string fileName() const;
 };

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Property types: what each holds, and its two type strings in files.
-#include "object/PropertyTypes.h"
+#include "schema/PropertyTypes.h"
 
 #include "schema/Schema.h"
 

@@ -1,80 +1,16 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The table of classes: one row per kind of object in files.
+// Types that the tables need beside the public ones.
 #include "schema/Schema.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-extern const ClassInfo kFbxNodeInfo, kFbxNodeAttributeInfo, kFbxNullInfo, kFbxSkeletonInfo, kFbxCameraInfo,
-    kFbxCameraStereoInfo, kFbxCameraSwitcherInfo, kFbxLightInfo, kFbxMarkerInfo, kFbxLODGroupInfo,
-    kFbxOpticalReferenceInfo, kFbxCachedEffectInfo, kFbxMeshInfo, kFbxShapeInfo, kFbxNurbsSurfaceInfo,
-    kFbxNurbsCurveInfo, kFbxTrimNurbsSurfaceInfo, kFbxBoundaryInfo, kFbxNurbsInfo, kFbxPatchInfo, kFbxLineInfo,
-    kFbxSkinInfo, kFbxClusterInfo, kFbxBlendShapeInfo, kFbxBlendShapeChannelInfo, kFbxVertexCacheDeformerInfo,
-    kFbxCacheInfo, kFbxSurfaceMaterialInfo, kFbxSurfaceLambertInfo, kFbxSurfacePhongInfo, kFbxFileTextureInfo,
-    kFbxLayeredTextureInfo, kFbxVideoInfo, kFbxAnimStackInfo, kFbxAnimLayerInfo, kFbxAnimCurveNodeInfo,
-    kFbxAnimCurveInfo;
-
 namespace {
 
 constinit const PropertyTypeInfo kAnimatableBoolInfo{eFbxBool, "Bool", "Bool", ""};
 constinit const PropertyTypeInfo kAnimatableIntInfo{eFbxInt, "Integer", "Integer", ""};
-
-constexpr std::string_view kAny = kAnySubClass;
-constexpr std::span<const PropertyRow> kNoRows;
-
-constinit const SchemaClass kClasses[] = {
-    {"Model", kAny, "Model", &kFbxNodeInfo, kNodeRows},
-
-    {"NodeAttribute", "Null", "NodeAttribute", &kFbxNullInfo, kNullRows},
-    {"NodeAttribute", "LimbNode", "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
-    {"NodeAttribute", "Limb", "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
-    {"NodeAttribute", "Root", "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
-    {"NodeAttribute", "Effector", "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
-    {"NodeAttribute", "Camera", "NodeAttribute", &kFbxCameraInfo, kCameraRows},
-    {"NodeAttribute", "CameraStereo", "NodeAttribute", &kFbxCameraStereoInfo, kCameraStereoRows},
-    {"NodeAttribute", "CameraSwitcher", "NodeAttribute", &kFbxCameraSwitcherInfo, kCameraSwitcherRows},
-    {"NodeAttribute", "Light", "NodeAttribute", &kFbxLightInfo, kLightRows},
-    {"NodeAttribute", "Marker", "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
-    {"NodeAttribute", "OpticalMarker", "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
-    {"NodeAttribute", "FKEffector", "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
-    {"NodeAttribute", "IKEffector", "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
-    {"NodeAttribute", "LodGroup", "NodeAttribute", &kFbxLODGroupInfo, kLodGroupRows},
-    {"NodeAttribute", "OpticalReference", "NodeAttribute", &kFbxOpticalReferenceInfo, kNodeAttributeRows},
-    {"NodeAttribute", "CachedEffect", "NodeAttribute", &kFbxCachedEffectInfo, kNodeAttributeRows},
-    {"NodeAttribute", kAny, "NodeAttribute", &kFbxNodeAttributeInfo, kNodeAttributeRows},
-
-    {"Geometry", "Mesh", "Geometry", &kFbxMeshInfo, kMeshRows},
-    {"Geometry", "Shape", "Geometry", &kFbxShapeInfo, kMeshRows},
-    {"Geometry", "NurbsSurface", "Geometry", &kFbxNurbsSurfaceInfo, kMeshRows},
-    {"Geometry", "NurbsCurve", "Geometry", &kFbxNurbsCurveInfo, kMeshRows},
-    {"Geometry", "TrimNurbsSurface", "Geometry", &kFbxTrimNurbsSurfaceInfo, kMeshRows},
-    {"Geometry", "Boundary", "Geometry", &kFbxBoundaryInfo, kMeshRows},
-    {"Geometry", "Nurb", "Geometry", &kFbxNurbsInfo, kMeshRows},
-    {"Geometry", "Patch", "Geometry", &kFbxPatchInfo, kMeshRows},
-    {"Geometry", "Line", "Geometry", &kFbxLineInfo, kLineRows},
-
-    {"Deformer", "Skin", "Deformer", &kFbxSkinInfo, kNoRows},
-    {"Deformer", "Cluster", "SubDeformer", &kFbxClusterInfo, kNoRows},
-    {"Deformer", "BlendShape", "Deformer", &kFbxBlendShapeInfo, kNoRows},
-    {"Deformer", "BlendShapeChannel", "SubDeformer", &kFbxBlendShapeChannelInfo, kNoRows},
-    {"Deformer", "VertexCacheDeformer", "Deformer", &kFbxVertexCacheDeformerInfo, kVertexCacheDeformerRows},
-    {"Cache", kAny, "Cache", &kFbxCacheInfo, kCacheRows},
-
-    {"Material", kAny, "Material", &kFbxSurfaceMaterialInfo, kMaterialRows},
-    {"Material", kAny, "Material", &kFbxSurfaceLambertInfo, kLambertRows},
-    {"Material", kAny, "Material", &kFbxSurfacePhongInfo, kPhongRows},
-    {"Texture", kAny, "Texture", &kFbxFileTextureInfo, kFileTextureRows},
-    {"LayeredTexture", kAny, "LayeredTexture", &kFbxLayeredTextureInfo, kLayeredTextureRows},
-    {"Video", "Clip", "Video", &kFbxVideoInfo, kVideoRows},
-    {"Video", kAny, "Video", &kFbxVideoInfo, kVideoRows},
-
-    {"AnimationStack", kAny, "AnimStack", &kFbxAnimStackInfo, kAnimStackRows},
-    {"AnimationLayer", kAny, "AnimLayer", &kFbxAnimLayerInfo, kAnimLayerRows},
-    {"AnimationCurveNode", kAny, "AnimCurveNode", &kFbxAnimCurveNodeInfo, kAnimCurveNodeRows},
-    {"AnimationCurve", kAny, "AnimCurve", &kFbxAnimCurveInfo, kNoRows},
-};
 
 } // namespace
 
@@ -87,27 +23,6 @@ int rowIndex(std::span<const PropertyRow> rows, std::string_view name) {
             return static_cast<int>(i);
     }
     return -1;
-}
-
-std::span<const SchemaClass> schemaClasses() { return kClasses; }
-
-const SchemaClass* findSchema(std::string_view record, std::string_view subClass) {
-    // A row for any sub-class stands after those of its record that name one.
-    for (const SchemaClass& row : kClasses) {
-        if (row.record == record && (row.subClass == subClass || row.subClass == kAny))
-            return &row;
-    }
-    return nullptr;
-}
-
-const SchemaClass* findSchema(const FbxClassId& id) {
-    for (FbxClassId each = id; each.IsValid(); each = each.GetParent()) {
-        for (const SchemaClass& row : kClasses) {
-            if (row.classId() == each)
-                return &row;
-        }
-    }
-    return nullptr;
 }
 
 } // namespace detail

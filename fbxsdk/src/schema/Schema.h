@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The properties that each class of objects has, with types and defaults, and what files call the classes.
+// The properties that each class of objects has, with types and defaults.
 //
 // The tables stand in the Schema*.cpp sources. Their sizes stand here, so that the spans are constants: a class can
 // take its rows before any initialiser has run, whatever the order of the sources.
@@ -10,7 +10,7 @@
 #include <span>
 #include <string_view>
 
-#include "object/ObjectData.h"
+#include "schema/PropertyRow.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -96,32 +96,6 @@ inline constexpr std::span<const PropertyRow> kGlobalSettingsRows{kGlobalSetting
 
 /// The place of the row of that name; -1 when there is none.
 [[nodiscard]] int rowIndex(std::span<const PropertyRow> rows, std::string_view name);
-
-/// One kind of object as files tell it: record name and sub-class on one side, the platform's class on the other.
-/// Readers and writers share these rows.
-struct SchemaClass {
-    std::string_view record;    ///< "Model", "NodeAttribute", …
-    std::string_view subClass;  ///< "Camera", "LimbNode", …; kAnySubClass where the record alone decides
-    std::string_view nameClass; ///< what stands before "::" in names: "SubDeformer", "AnimStack", …
-    const ClassInfo* info;
-    std::span<const PropertyRow> rows; ///< of the class's property template; empty where files have none
-
-    [[nodiscard]] FbxClassId classId() const { return FbxClassId(info); }
-    /// The name of the class's property template: "FbxNode", "FbxSurfacePhong", …
-    [[nodiscard]] const char* templateName() const { return info->name; }
-};
-
-inline constexpr std::string_view kAnySubClass = "*";
-
-/// All classes that files have. Of several rows for one class the usual one comes first.
-[[nodiscard]] std::span<const SchemaClass> schemaClasses();
-
-/// The class for a record and sub-class; null for objects that the platform does not keep. A material's class depends
-/// on its shading model as well: here it is the plain one.
-[[nodiscard]] const SchemaClass* findSchema(std::string_view record, std::string_view subClass);
-
-/// The first row of the class, or of the nearest class above it that files have; null when there is none.
-[[nodiscard]] const SchemaClass* findSchema(const FbxClassId& id);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

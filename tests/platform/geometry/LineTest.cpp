@@ -4,9 +4,9 @@
 // Polylines from records and from hosts.
 #include <fbxsdk/FbxLine.h>
 
-#include "../scene/SceneFixture.h"
 #include "NurbsSamples.h"
 #include "geometry/LineReading.h"
+#include "platform/scene/SceneFixture.h"
 
 namespace fbxsdk::detail {
 namespace {

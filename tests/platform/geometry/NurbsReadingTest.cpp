@@ -6,8 +6,8 @@
 
 #include <fbxsdk/FbxTrimNurbsSurface.h>
 
-#include "../scene/SceneFixture.h"
 #include "NurbsSamples.h"
+#include "platform/scene/SceneFixture.h"
 
 namespace fbxsdk::detail {
 namespace {

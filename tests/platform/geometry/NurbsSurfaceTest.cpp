@@ -5,7 +5,7 @@
 #include <fbxsdk/FbxNurbs.h>
 #include <fbxsdk/FbxTrimNurbsSurface.h>
 
-#include "../scene/SceneFixture.h"
+#include "platform/scene/SceneFixture.h"
 
 namespace fbxsdk {
 namespace {

@@ -4,9 +4,9 @@
 // Patches from records and from hosts.
 #include <fbxsdk/FbxPatch.h>
 
-#include "../scene/SceneFixture.h"
 #include "NurbsSamples.h"
 #include "geometry/PatchReading.h"
+#include "platform/scene/SceneFixture.h"
 
 namespace fbxsdk::detail {
 namespace {

@@ -13,8 +13,8 @@
 #include <fbxsdk/FbxImporter.h>
 #include <fbxsdk/FbxNode.h>
 
-#include "document/VersionTraits.h"
 #include "platform/scene/SceneFixture.h"
+#include "schema/VersionTraits.h"
 #include "support/TemporaryFolder.h"
 
 namespace exporting {

@@ -27,7 +27,7 @@
 
 #include "ExportFixture.h"
 #include "container/Record.h"
-#include "object/PropertyTypes.h"
+#include "schema/PropertyTypes.h"
 
 namespace {
 

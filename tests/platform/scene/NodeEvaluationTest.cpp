@@ -605,11 +605,11 @@ TEST_F(CacheInvalidationTest, KeepsOneTransformForAllTimesWhereNothingMoves) {
 
     EXPECT_TRUE(still->evaluation().hasStillGlobal);
     EXPECT_TRUE(leaf->evaluation().hasStillGlobal);
-    EXPECT_EQ(manager->data().evaluationBudget.places(), 0U);
+    EXPECT_EQ(detail::evaluationBudgetOf(manager->data()).places(), 0U);
 }
 
 TEST_F(CacheInvalidationTest, CountsWhatItHoldsAndGivesItBack) {
-    const detail::EvaluationBudget& budget = manager->data().evaluationBudget;
+    const detail::EvaluationBudget& budget = detail::evaluationBudgetOf(manager->data());
     keys(parent->LclTranslation, layer, "X", {{0, 0}, {1, 1}});
     addNode("leaf", child);
     for (int i = 0; i < 10; ++i)
@@ -624,7 +624,7 @@ TEST_F(CacheInvalidationTest, CountsWhatItHoldsAndGivesItBack) {
 }
 
 TEST_F(CacheInvalidationTest, HandsTheMemoryOfReleasedTransformsToTheNextNode) {
-    detail::EvaluationBudget& budget = manager->data().evaluationBudget;
+    detail::EvaluationBudget& budget = detail::evaluationBudgetOf(manager->data());
     keys(parent->LclTranslation, layer, "X", {{0, 0}, {1, 1}});
     FbxNode* other = addNode("other");
     addNode("below", other);
@@ -650,7 +650,7 @@ TEST_F(CacheInvalidationTest, StaysWithinItsBudgetHoweverManyNodesAndTimes) {
     FbxNode* node = child;
     for (int i = 0; i < 40; ++i)
         node = addNode("n", node);
-    const detail::EvaluationBudget& budget = manager->data().evaluationBudget;
+    const detail::EvaluationBudget& budget = detail::evaluationBudgetOf(manager->data());
 
     for (int i = 0; i < 20'000; ++i)
         globalX(node, FbxTime(i));

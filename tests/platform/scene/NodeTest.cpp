@@ -15,7 +15,7 @@
 #include <fbxsdk/FbxSurfaceMaterial.h>
 
 #include "SceneFixture.h"
-#include "schema/ShadingLetters.h"
+#include "schema/Spellings.h"
 
 namespace {
 
@@ -212,22 +212,22 @@ TEST_F(FbxNodeTest, KeepsItsShadingMode) {
     EXPECT_EQ(made->GetShadingMode(), 4);
 }
 
-TEST(ShadingLetters, GoBothWays) {
+TEST(ShadingModes, HaveALetterEach) {
     const struct {
         FbxNode::EShadingMode mode;
         char letter;
     } cases[] = {{FbxNode::eHardShading, 'Y'},  {FbxNode::eWireFrame, 'W'},      {FbxNode::eFlatShading, 'F'},
                  {FbxNode::eLightShading, 'L'}, {FbxNode::eTextureShading, 'T'}, {FbxNode::eFullShading, 'U'}};
     for (const auto& each : cases) {
-        EXPECT_EQ(detail::shadingLetterOf(each.mode), each.letter);
-        EXPECT_EQ(detail::shadingModeOf(each.letter), each.mode);
+        EXPECT_EQ(detail::spellingOf(detail::kShadingModes, each.mode, FbxNode::eHardShading), each.letter);
+        EXPECT_EQ(detail::numberOf(detail::kShadingModes, each.letter, -1), each.mode);
     }
 }
 
-TEST(ShadingLetters, TakeWhatIsNoLetterForTheDefault) {
+TEST(ShadingModes, AreTheDefaultForWhatIsNoLetter) {
     for (const char letter : {'\0', 't', '?', '\xff'})
-        EXPECT_EQ(detail::shadingModeOf(letter), FbxNode::eHardShading);
-    EXPECT_EQ(detail::shadingLetterOf(static_cast<FbxNode::EShadingMode>(6)), 'Y');
+        EXPECT_EQ(detail::numberOf(detail::kShadingModes, letter, FbxNode::eHardShading), FbxNode::eHardShading);
+    EXPECT_EQ(detail::spellingOf(detail::kShadingModes, 6, FbxNode::eHardShading), 'Y');
 }
 
 } // namespace

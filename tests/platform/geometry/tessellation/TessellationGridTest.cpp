@@ -8,8 +8,8 @@
 
 #include <fbxsdk/FbxMesh.h>
 
-#include "../scene/SceneFixture.h"
 #include "platform/geometry/NurbsSamples.h"
+#include "platform/scene/SceneFixture.h"
 
 namespace fbxsdk::detail {
 namespace {
