@@ -19,6 +19,13 @@ function(tarnell_precompile_standard_headers name)
   endif()
 endfunction()
 
+# Lets every basic block of the target call a function, by which tests/growth counts work.
+function(tarnell_count_steps name)
+  if(TARNELL_FBX_COUNT_STEPS)
+    target_compile_options(${name} PRIVATE -fsanitize-coverage=trace-pc)
+  endif()
+endfunction()
+
 # tarnell_room(NAME [NEEDS room...] [LIBRARIES library...]): every source below src/NAME. A room may use those it needs,
 # and those that these need. `fbxsdk_up_to_NAME` is all of them, with the internals visible: what the room's tests link.
 function(tarnell_room name)
@@ -30,6 +37,7 @@ function(tarnell_room name)
     "${PROJECT_SOURCE_DIR}/fbxsdk/include" "${PROJECT_SOURCE_DIR}/fbxsdk/src")
   target_compile_definitions(fbxsdk_${name} PRIVATE FBXSDK_BUILDING)
   tarnell_precompile_standard_headers(fbxsdk_${name})
+  tarnell_count_steps(fbxsdk_${name})
 
   set(rooms ${name})
   foreach(need IN LISTS ARG_NEEDS)
