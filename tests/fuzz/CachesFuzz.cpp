@@ -178,8 +178,8 @@ void check(const Stage& stage, const std::string& cacheFile, const std::string& 
     fbxsdk::FbxStatus status;
     const bool opens = cache->OpenFileForRead(&status);
     require(opens != status.Error(), "status and result disagree");
-    require(opens || !isCache || !facts.faults.empty() || facts.samples.empty(),
-            "a cache without faults does not open");
+    const bool isSound = isCache && facts.format == format && facts.faults.empty() && !facts.samples.empty();
+    require(opens || !isSound, "a cache without faults does not open");
     if (opens && format == FbxCache::eMaxPointCacheV2)
         readMax(*cache);
     else if (opens)

@@ -45,6 +45,11 @@ inline bool limitMemory() {
     return true;
 }
 
+/// Whether the last call failed for that.
+inline bool isBeyondLimit() {
+    return Tarnell::Fbx::lastError().find("would be needed, and the limit is") != std::string::npos;
+}
+
 /// Every object of a kind in a file.
 template <class Object>
 struct List {
@@ -58,7 +63,7 @@ struct List {
         Object* made = nullptr;
         read = (Tarnell::Fbx::Fbx().*reader)(info, &made, count);
         objects.reset(made);
-        isTooLarge = Tarnell::Fbx::lastError().find("would be needed, and the limit is") != std::string::npos;
+        isTooLarge = isBeyondLimit();
         require(read || !Tarnell::Fbx::lastError().empty(), "a failure without a reason");
         require(count >= 0 && (read || isTooLarge || count == 0) && (count == 0 || made != nullptr),
                 "a count without objects");
