@@ -10,10 +10,10 @@ function(tarnell_precompile name)
   endif()
 endfunction()
 
-# Builds with sanitizers read what most sources include only once. The others do without: they show whether each source
-# includes what it uses.
+# Builds with sanitizers or counters read what most sources include only once. The others do without: they show whether
+# each source includes what it uses.
 function(tarnell_precompile_standard_headers name)
-  if(TARNELL_FBX_SANITIZE)
+  if(TARNELL_FBX_SANITIZE OR TARNELL_FBX_COVERAGE)
     tarnell_precompile(${name}
       <algorithm> <functional> <memory> <span> <string> <string_view> <unordered_map> <vector>)
   endif()

@@ -204,10 +204,11 @@ void FileBytes::requireUnchanged() const {
 }
 
 void ReadAhead::fetchUpTo(std::size_t offset, std::size_t end) {
-    constexpr std::size_t kSmallestStep = std::size_t{1} << 10, kLargestStep = std::size_t{1} << 18;
+    // Bytes have their places from the beginning of a page on, and getting a page takes longer than filling it.
+    constexpr std::size_t kSmallestStep = std::size_t{1} << 9, kLargestStep = std::size_t{1} << 18, kPage = 1 << 12;
     mStep = offset > mEnd ? kSmallestStep : std::clamp(2 * mStep, kSmallestStep, kLargestStep);
     const std::size_t start = std::max(offset, mEnd);
-    mEnd = std::min(std::max(end, start + mStep), mBytes.size());
+    mEnd = std::min((std::max(end, start + mStep) + kPage - 1) / kPage * kPage, mBytes.size());
     mFile->fetch(mBytes.subspan(start, mEnd - start));
 }
 
