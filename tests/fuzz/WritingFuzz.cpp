@@ -238,33 +238,41 @@ TnFbxReadInfo readInfo(const std::string& file) {
     return info;
 }
 
-void requireSameBits(float a, float b, const char* what) {
-    require(std::bit_cast<std::uint32_t>(a) == std::bit_cast<std::uint32_t>(b) || (std::isnan(a) && std::isnan(b)),
-            what);
+/// Position and scale come back as they are; a zero may lose its sign. Text has no spelling for what is not finite.
+void requireSamePlace(const TnFbxTransform& written, const TnFbxTransform& read, bool ascii) {
+    using Channel = TnFbxTransform::EFbxTransformChannelType;
+    for (const int first : {TnFbxTransform::kFbxTransformPositionX, TnFbxTransform::kFbxTransformScaleX}) {
+        for (int i = first; i < first + 3; ++i) {
+            const auto channel = static_cast<Channel>(i);
+            const float value = written.getTransformValue(channel);
+            if (!written.getTransformAnimated(channel) && (!ascii || std::isfinite(value)))
+                require(read.getTransformValue(channel) == value || std::isnan(value), "an object at another place");
+        }
+    }
 }
 
-/// Lights and nulls come back as they are, to the bit. Text has no spelling for what is not finite.
+/// The objects of a kind are from some place in the copy on, in order.
+template <class Object, class Read>
+void requireSamePlaces(const std::vector<Object*>& written, const List<Read>& copy, int from, bool ascii) {
+    for (const Object* object : written) {
+        if (object)
+            requireSamePlace(*object, copy.objects[static_cast<std::size_t>(from++)], ascii);
+    }
+}
+
 void compare(const Scene& scene, const Copy& copy, bool ascii) {
     constexpr int kProducerCameras = 7;
+    const int transforms = countOf(scene.transforms.pointers);
     require(copy.cameras.read && copy.lights.read && copy.nulls.read && copy.meshes.read, "a copy that cannot be read");
     require(copy.lights.count == countOf(scene.lights.pointers), "a copy with other lights");
     require(copy.cameras.count == countOf(scene.cameras.pointers) + kProducerCameras, "a copy with other cameras");
-    require(copy.nulls.count == countOf(scene.transforms.pointers) + countOf(scene.nulls.pointers),
-            "a copy with other nulls");
+    require(copy.nulls.count == transforms + countOf(scene.nulls.pointers), "a copy with other nulls");
     require(copy.meshes.count <= countOf(scene.meshes.pointers), "a copy with more meshes");
     for (const TnFbxMesh* mesh : copy.meshes.pointers())
         fuzz::checkMesh(*mesh);
-    int i = 0;
-    for (const TnFbxLight* light : scene.lights.pointers) {
-        if (!light)
-            continue;
-        const TnFbxLight& read = copy.lights.objects[static_cast<std::size_t>(i++)];
-        for (const auto channel : {TnFbxTransform::kFbxTransformPositionX, TnFbxTransform::kFbxTransformScaleY}) {
-            const float value = light->getTransformValue(channel);
-            if (!light->getTransformAnimated(channel) && (!ascii || std::isfinite(value)))
-                requireSameBits(read.getTransformValue(channel), value, "a light at another place");
-        }
-    }
+    requireSamePlaces(scene.lights.pointers, copy.lights, 0, ascii);
+    requireSamePlaces(scene.transforms.pointers, copy.nulls, 0, ascii);
+    requireSamePlaces(scene.nulls.pointers, copy.nulls, transforms, ascii);
 }
 
 void checkOutcome(const support::TemporaryFolder& folder, const Scene& scene, TnFbxWriteInfo info) {
