@@ -10,10 +10,10 @@ function(tarnell_precompile name)
   endif()
 endfunction()
 
-# Builds with sanitizers read what most sources include only once. The others do without: they show whether each source
-# includes what it uses.
+# Builds with sanitizers or counters read what most sources include only once. The others do without: they show whether
+# each source includes what it uses.
 function(tarnell_precompile_standard_headers name)
-  if(TARNELL_FBX_SANITIZE)
+  if(TARNELL_FBX_SANITIZE OR TARNELL_FBX_COVERAGE)
     tarnell_precompile(${name}
       <algorithm> <functional> <memory> <span> <string> <string_view> <unordered_map> <vector>)
   endif()
@@ -89,7 +89,7 @@ function(tarnell_test name)
   # They run for moments: to optimise them takes longer than it saves.
   target_compile_options(${name} PRIVATE -O0)
   tarnell_precompile_test_headers(${name})
-  if(TARNELL_FBX_SANITIZE)
+  if(TARNELL_FBX_SANITIZE OR TARNELL_FBX_COVERAGE)
     # To start an instrumented program takes longer than most of its tests.
     add_test(NAME ${name} COMMAND ${name} --gtest_brief=1)
     set_tests_properties(${name} PROPERTIES TIMEOUT 900)

@@ -10,8 +10,9 @@
 
 namespace Tarnell::Fbx {
 
-/// The bytes that the objects of one call may take, samples and mesh arrays included; what loading a file takes is not
-/// counted. A call that would hand out more fails, and `lastError()` says how much it would have been.
+/// The bytes that the objects of one call may take, samples and mesh arrays included, or the keys of a scene that is
+/// written; what loading a file takes is not counted. A call that would take more fails, and `lastError()` says how
+/// much it would have been.
 ///
 /// One value for the whole process, which any thread may read and set at any time; a call that has begun keeps the one
 /// it began with. At first half of the machine's memory.

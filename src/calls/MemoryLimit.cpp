@@ -47,8 +47,8 @@ bool detail::MemoryAccount::take(std::uint64_t bytes) {
     return !exceeded();
 }
 
-std::string detail::MemoryAccount::describe() const {
-    return describeBytes(mNeeded) + " of samples and points would be needed, and the limit is " + describeBytes(mLimit);
+std::string detail::MemoryAccount::describe(const char* what) const {
+    return describeBytes(mNeeded) + " of " + what + " would be needed, and the limit is " + describeBytes(mLimit);
 }
 
 std::string detail::describeBytes(std::uint64_t bytes) {

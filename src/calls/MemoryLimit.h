@@ -15,6 +15,8 @@ class MemoryAccount {
 public:
     /// Counts anew, against the limit in force now.
     void begin();
+    /// From here on nothing is limited.
+    void end() { *this = {}; }
     /// False when the bytes counted so far, these included, are more than the limit.
     bool take(std::uint64_t bytes);
     /// Of bytes that were granted and turned out not to be needed.
@@ -22,11 +24,11 @@ public:
     std::uint64_t limit() const { return mLimit; }
     bool exceeded() const { return mNeeded > mLimit; }
     /// "12.3 GiB of samples and points would be needed, and the limit is 8.0 GiB".
-    std::string describe() const;
+    std::string describe(const char* what = "samples and points") const;
 
 private:
     std::uint64_t mNeeded = 0;
-    std::uint64_t mLimit = UINT64_MAX; // outside of a list: none
+    std::uint64_t mLimit = UINT64_MAX; // outside of a call: none
 };
 
 /// A number of bytes for people: "512 bytes", "3.4 MiB".

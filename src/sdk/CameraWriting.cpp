@@ -95,7 +95,7 @@ bool FbxSdk::setCameraCurveValues(fbxsdk::FbxNode* node, TnFbxCamera* camera) {
     if (!setTransformCurveValues(node, camera)) {
         return false;
     }
-    ChannelWriter writer(currentLayer(), *mFrameTimes);
+    ChannelWriter writer(currentLayer(), *mFrameTimes, *mMemory);
     writeFilmSize(writer, *camera, *target);
     writer.write(target->NearPlane, camera->getCameraChannel(TnFbxCamera::kFbxCameraNearPlane));
     writer.write(target->FarPlane, camera->getCameraChannel(TnFbxCamera::kFbxCameraFarPlane));

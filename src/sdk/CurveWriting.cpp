@@ -6,6 +6,7 @@
 
 #include "PropertySampling.h"
 #include "calls/LastError.h"
+#include "model/FrameArithmetic.h"
 
 namespace Tarnell::Fbx {
 
@@ -16,6 +17,15 @@ using detail::kComponents;
 using detail::succeed;
 
 namespace {
+
+/// What the scene holds of a key: its time, its value, and which attributes it has. A channel whose samples are all
+/// equal has one of them in memory, and as many keys as frames.
+constexpr std::uint64_t kKeyBytes = 16;
+
+bool mayAddKeys(const TnFbxTime& range, detail::MemoryAccount& memory) {
+    const std::int64_t frames = detail::frameCount(range.getStartFrame(), range.getEndFrame());
+    return memory.take(static_cast<std::uint64_t>(frames > 0 ? frames : 0) * kKeyBytes);
+}
 
 void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float scale, detail::FrameTimes& times) {
     const TnFbxTime range = channel.getTime();
@@ -51,12 +61,16 @@ fbxsdk::FbxDouble3 staticValues(const TnFbxTransform& transform, TnFbxTransform:
 
 } // namespace
 
-bool detail::writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel, float scale, FrameTimes& times) {
+bool detail::writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel, float scale, FrameTimes& times,
+                        MemoryAccount& memory) {
     if (curve == nullptr || channel == nullptr) {
         return fail("no curve or no channel to write");
     }
     curve->SetValue(channel->getValue(), /*pCurveNodeIndex*/ 0); // kept: not scaled, although the keys are
     if (channel->getAnimated()) {
+        if (!mayAddKeys(channel->getTime(), memory)) {
+            return fail(memory.describe("keys"));
+        }
         curve->KeyModifyBegin();
         addKeys(*curve, *channel, scale, times);
         curve->KeyModifyEnd();
@@ -65,7 +79,7 @@ bool detail::writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel
 }
 
 bool FbxSdk::setCurveValues(fbxsdk::FbxAnimCurve* curve, TnFbxChannel* channel, float scale) const {
-    return detail::writeCurve(curve, channel, scale, *mFrameTimes);
+    return detail::writeCurve(curve, channel, scale, *mFrameTimes, *mMemory);
 }
 
 /// The layer that is written to; null without a stack or layer.
@@ -81,7 +95,7 @@ bool FbxSdk::setTransformCurveValues(fbxsdk::FbxNode* node, TnFbxTransform* tran
     for (const LocalRow& row : kLocalRows) {
         (node->*row.property).Set(staticValues(*transform, row.firstChannel));
     }
-    ChannelWriter writer(currentLayer(), *mFrameTimes);
+    ChannelWriter writer(currentLayer(), *mFrameTimes, *mMemory);
     for (const LocalRow& row : kLocalRows) {
         for (int i = 0; i < 3; ++i) {
             TnFbxChannel* channel = transform->getTransformChannel(channelAfter(row.firstChannel, i));

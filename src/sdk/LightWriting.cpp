@@ -102,7 +102,7 @@ bool FbxSdk::setLightCurveValues(fbxsdk::FbxNode* node, TnFbxLight* light) {
     if (!setTransformCurveValues(node, light)) {
         return false;
     }
-    ChannelWriter writer(currentLayer(), *mFrameTimes);
+    ChannelWriter writer(currentLayer(), *mFrameTimes, *mMemory);
     if (!writeColour(writer, *light, *target) || !writeIntensity(writer, *light, *target) ||
         !writeType(writer, *light, *target)) {
         return fail("the light lacks a channel");

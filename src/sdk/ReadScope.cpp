@@ -22,6 +22,7 @@ ReadScope::ReadScope(FbxSdk& sdk) : mSdk(sdk), mIsOutermost(!std::exchange(sdk.m
 ReadScope::~ReadScope() {
     if (mIsOutermost) {
         mSdk.mIsReading = false;
+        mSdk.mMemory->end();
     }
 }
 

@@ -8,6 +8,7 @@
 #include "WriteChecks.h"
 #include "access/TimeModeScope.h"
 #include "calls/LastError.h"
+#include "calls/MemoryLimit.h"
 #include "model/FrameArithmetic.h"
 
 #include "TnFbxError.h"
@@ -113,6 +114,18 @@ private:
     bool mFound = false;
 };
 
+/// The keys of one scene, held against `memoryLimit()`.
+class KeyScope {
+public:
+    explicit KeyScope(detail::MemoryAccount& memory) : mMemory(memory) { mMemory.begin(); }
+    ~KeyScope() { mMemory.end(); }
+    KeyScope(const KeyScope&) = delete;
+    KeyScope& operator=(const KeyScope&) = delete;
+
+private:
+    detail::MemoryAccount& mMemory;
+};
+
 /// Adds nodes to the root, and gathers what is to be said of all of them.
 class SceneBuilder {
 public:
@@ -175,6 +188,7 @@ bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCame
         return fail("the scene has no root node");
     }
 
+    const KeyScope keys(*mMemory);
     SceneBuilder builder(*root, mCurrentAnimStack);
     // kept: cameras and lights are made in the scene, everything else by the manager
     if (info.getWriteCameras()) {
@@ -216,6 +230,9 @@ bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCame
         });
     }
     builder.finish(info, *mScene);
+    if (mMemory->exceeded()) {
+        return fail(info.getFileName() + ": " + mMemory->describe("keys"));
+    }
     return succeed(); // kept: also when a curve or a point cache could not be written
 }
 

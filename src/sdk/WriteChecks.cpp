@@ -23,6 +23,9 @@ bool isRate(float framesPerSecond) { return std::isfinite(framesPerSecond) && fr
 
 bool hasFiniteSamples(const TnFbxChannel& channel) {
     const TnFbxTime range = channel.getTime();
+    if (channel.isConstant()) {
+        return std::isfinite(channel.getAnimatedValue(static_cast<float>(range.getStartFrame())));
+    }
     for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
         if (!std::isfinite(channel.getAnimatedValue(static_cast<float>(frame)))) {
             return false;

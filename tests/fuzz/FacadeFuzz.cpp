@@ -3,7 +3,7 @@
 //
 // Any bytes, read as a host reads a file, give sound objects or a sentence; and what was read can be written and read
 // again.
-#include "support/TemporaryFolder.h"
+#include "fuzz/FuzzSupport.h"
 
 #include <Fbx.h>
 #include <TnFbxCamera.h>
@@ -18,10 +18,7 @@
 
 #include <algorithm>
 #include <cstdint>
-#include <cstdio>
-#include <cstdlib>
 #include <functional>
-#include <memory>
 #include <string>
 #include <vector>
 
@@ -32,47 +29,9 @@ using namespace Tarnell::Fbx;
 /// Longer clips are read, but not written: they would only cost time.
 constexpr int kLongestWrittenClip = 500;
 
-void require(bool holds, const char* what) {
-    if (!holds) {
-        std::fprintf(stderr, "broken: %s (%s)\n", what, lastError().c_str());
-        std::abort();
-    }
-}
-
-template <class Object>
-struct List {
-    std::unique_ptr<Object[]> objects;
-    int count = 0;
-    bool read = false;
-
-    List(TnFbxReadInfo& info, bool (Fbx::*reader)(TnFbxReadInfo&, Object**, int&) const) {
-        Object* made = nullptr;
-        read = (Fbx().*reader)(info, &made, count);
-        objects.reset(made);
-        require(read || !lastError().empty(), "a failure without a reason");
-        require(count >= 0 && (read || count == 0) && (count == 0 || made != nullptr), "a count without objects");
-    }
-
-    [[nodiscard]] std::vector<Object*> pointers() const {
-        std::vector<Object*> all;
-        for (int i = 0; i < count; ++i)
-            all.push_back(&objects[static_cast<std::size_t>(i)]);
-        return all;
-    }
-};
-
-void checkMesh(const TnFbxMesh& mesh) {
-    int corners = 0;
-    for (int p = 0; p < mesh.getNumberOfPolygons(); ++p) {
-        require(mesh.getPolygonVertexSize(p) >= 0, "a polygon of a negative size");
-        corners += mesh.getPolygonVertexSize(p);
-    }
-    require(corners == mesh.getNumberOfPolygonVertices(), "polygons have other corners than the mesh");
-    for (int i = 0; i < corners; ++i) {
-        const int point = mesh.getPointIndex(i);
-        require(point >= 0 && point < mesh.getNumberOfControlPoints(), "a corner without a point");
-    }
-}
+using fuzz::checkMesh;
+using fuzz::List;
+using fuzz::require;
 
 /// The frames of the longest of the channels, which are numbered from 0 to the last one.
 template <class Object, class Channel>
@@ -150,10 +109,12 @@ void readAndWrite(const support::TemporaryFolder& folder, Choices choices) {
     const List<TnFbxMesh> meshes(info, &Fbx::getMeshes);
     for (const TnFbxMesh* mesh : meshes.pointers())
         checkMesh(*mesh);
-    require(cameras.read == lights.read && lights.read == markers.read && markers.read == nulls.read &&
-                nulls.read == transforms.read,
+    const auto opens = [](const auto& list) { return list.read || list.isTooLarge; };
+    require(opens(cameras) == opens(lights) && opens(lights) == opens(markers) && opens(markers) == opens(nulls) &&
+                opens(nulls) == opens(transforms),
             "a file that opens for one kind and not for another");
-    if (!cameras.read || !areShort(cameras) || !areShort(lights) || !areShort(transforms) || !areShort(meshes))
+    const bool areRead = cameras.read && lights.read && markers.read && nulls.read && transforms.read && meshes.read;
+    if (!areRead || !areShort(cameras) || !areShort(lights) || !areShort(transforms) || !areShort(meshes))
         return;
 
     const std::string copy = folder.file("copy.fbx");
@@ -174,8 +135,9 @@ void readAndWrite(const support::TemporaryFolder& folder, Choices choices) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
     static const support::TemporaryFolder folder;
+    [[maybe_unused]] static const bool isLimited = fuzz::limitMemory();
     const std::string content(reinterpret_cast<const char*>(bytes), size);
-    folder.write("input.fbx", content);
+    fuzz::writeOldFile(folder, "input.fbx", content);
     readAndWrite(folder, Choices{std::hash<std::string>{}(content)});
     return 0;
 }

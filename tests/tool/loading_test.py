@@ -4,12 +4,11 @@
 # How much memory loading a file takes: never more than 64 MiB and 1,100 times the size of the file, whatever the file
 # asks for. Objects of a kind that the file has none of are read, so that nothing is handed out.
 import os
-import subprocess
 import sys
 import tempfile
 import unittest
 
-from support import TOOL
+from support import peak_of
 
 NUMBERS = "*{} {{\na: {}\n}}\n"
 
@@ -74,15 +73,6 @@ class Loading(unittest.TestCase):
         self.addCleanup(folder.cleanup)
         self.file = os.path.join(folder.name, "case.fbx")
 
-    def run_tool(self, *arguments):
-        """The exit status of the tool and the most memory that it had, in bytes."""
-        process = subprocess.Popen([TOOL, *arguments], stdout=subprocess.DEVNULL, stderr=subprocess.PIPE, text=True)
-        complaint = process.stderr.read()
-        process.stderr.close()
-        _, status, usage = os.wait4(process.pid, 0)
-        process.returncode = os.waitstatus_to_exitcode(status)
-        return process.returncode, usage.ru_maxrss * 1024, complaint
-
     def write(self, objects, connections):
         with open(self.file, "w", encoding="utf-8") as file:
             file.write("; FBX 7.4.0 project file\nFBXHeaderExtension: {\nFBXVersion: 7400\n}\nObjects: {\n")
@@ -96,7 +86,7 @@ class Loading(unittest.TestCase):
             with self.subTest(name):
                 self.write(*make())
 
-                status, peak, complaint = self.run_tool("dump", "--kind", "lights", self.file)
+                status, peak, complaint = peak_of("dump", "--kind", "lights", self.file)
 
                 self.assertEqual((status, complaint), (0, ""))
                 self.assertLess(peak, (64 << 20) + 1100 * os.path.getsize(self.file))
@@ -104,7 +94,7 @@ class Loading(unittest.TestCase):
     def test_meshes_of_surfaces_take_little_beyond(self):
         self.write(*geometries(300, "Nurb", surface(127, 127)))
 
-        status, peak, _ = self.run_tool("dump", "--kind", "meshes", self.file)
+        status, peak, _ = peak_of("dump", "--kind", "meshes", self.file)
 
         self.assertEqual(status, 0)
         self.assertLess(peak, 600 << 20)
@@ -113,7 +103,7 @@ class Loading(unittest.TestCase):
         with open(self.file, "wb") as file:
             file.truncate(6 << 30)  # zeros that take no room on the disk
 
-        status, peak, complaint = self.run_tool("info", self.file)
+        status, peak, complaint = peak_of("info", self.file)
 
         self.assertEqual(status, 1)
         self.assertRegex(complaint, "neither a binary nor an ASCII FBX file")

@@ -21,6 +21,16 @@ def run(*arguments, **more):
     return subprocess.run([TOOL, *arguments], capture_output=True, text=True, timeout=120, **more)
 
 
+def peak_of(*arguments):
+    """The exit status of the tool, the most memory that it had, in bytes, and what it complained of."""
+    process = subprocess.Popen([TOOL, *arguments], stdout=subprocess.DEVNULL, stderr=subprocess.PIPE, text=True)
+    complaint = process.stderr.read()
+    process.stderr.close()
+    _, status, usage = os.wait4(process.pid, 0)
+    process.returncode = os.waitstatus_to_exitcode(status)
+    return process.returncode, usage.ru_maxrss * 1024, complaint
+
+
 def dump(*arguments):
     result = run("dump", *arguments)
     assert result.returncode == 0, result.stderr

@@ -9,7 +9,9 @@
 #include <cstdio>
 #include <filesystem>
 #include <optional>
+#include <string_view>
 #include <system_error>
+#include <unordered_map>
 
 #include <fbxsdk/FbxScene.h>
 
@@ -48,6 +50,24 @@ std::optional<std::size_t> firstNotFinite(std::span<const char> bytes, bool swap
     return {};
 }
 
+/// More are as many as nobody reads, and each may name a channel.
+constexpr std::size_t kMostFaults = 1000;
+
+/// Adds a fault unless there are enough; the last one says so.
+void addFault(CacheFacts& facts, const std::string& file, std::uint64_t offset, const std::string& reason) {
+    if (facts.faults.size() < kMostFaults) {
+        const bool isLast = facts.faults.size() + 1 == kMostFaults;
+        facts.faults.push_back({file, offset, isLast ? reason + "; further ones are not listed" : reason});
+    }
+}
+
+/// Names are as long as a file says.
+std::string channelText(std::string_view name) {
+    constexpr std::size_t kMostBytes = 200;
+    const bool isWhole = name.size() <= kMostBytes;
+    return "channel " + std::string(name.substr(0, kMostBytes)) + (isWhole ? "" : "…");
+}
+
 std::string pointsOf(std::uint64_t count) { return std::to_string(count) + (count == 1 ? " point" : " points"); }
 
 // ---- Maya ----
@@ -71,8 +91,11 @@ public:
                 readFile(file, ticks);
         }
         finish();
-        for (const detail::MayaCacheChannel& channel : mDescription.channels)
-            checkTimes(channel);
+        const auto times = sampleTimes();
+        for (const detail::MayaCacheChannel& channel : mDescription.channels) {
+            const auto found = times.find(channel.name);
+            checkTimes(channel, found != times.end() ? found->second : std::vector<double>());
+        }
         return true;
     }
 
@@ -91,7 +114,7 @@ private:
     [[nodiscard]] double frameOf(double ticks) const { return ticks / mDescription.ticksPerFrame; }
 
     void fault(const std::string& file, std::uint64_t offset, const std::string& reason) {
-        mFacts.faults.push_back({file, offset, reason});
+        addFault(mFacts, file, offset, reason);
     }
 
     void takeChannels() {
@@ -127,11 +150,11 @@ private:
     }
 
     std::uint32_t channelIndex(std::string_view name) {
-        auto& names = mFacts.channelNames;
-        const auto index = static_cast<std::size_t>(std::find(names.begin(), names.end(), name) - names.begin());
-        if (index == names.size())
-            names.emplace_back(name);
-        return static_cast<std::uint32_t>(index);
+        const auto next = static_cast<std::uint32_t>(mFacts.channelNames.size());
+        const auto [place, isNew] = mChannelIndices.try_emplace(std::string(name), next);
+        if (isNew)
+            mFacts.channelNames.emplace_back(name);
+        return place->second;
     }
 
     void addSamples(std::span<const char> bytes, const detail::MayaCacheFrame& frame, std::int32_t ticks) {
@@ -151,7 +174,7 @@ private:
         const auto bad =
             block.doubles ? firstNotFinite<double>(block.bytes, kSwap) : firstNotFinite<float>(block.bytes, kSwap);
         if (bad)
-            fault(file, offset + *bad, "channel " + std::string(block.channel) + ": a number that is not finite");
+            fault(file, offset + *bad, channelText(block.channel) + ": a number that is not finite");
     }
 
     void finish() {
@@ -170,20 +193,23 @@ private:
                 first = sample.count;
             if (*first != sample.count)
                 fault(mFacts.fileNames[sample.file], sample.offset,
-                      "channel " + mFacts.channelNames[sample.channel] + ": " + pointsOf(sample.count) +
+                      channelText(mFacts.channelNames[sample.channel]) + ": " + pointsOf(sample.count) +
                           ", its first sample has " + std::to_string(*first));
         }
     }
 
+    /// The frames at which each channel has samples, in order.
+    [[nodiscard]] std::unordered_map<std::string_view, std::vector<double>> sampleTimes() const {
+        std::unordered_map<std::string_view, std::vector<double>> times;
+        for (const CacheSampleFacts& sample : mFacts.samples)
+            times[mFacts.channelNames[sample.channel]].push_back(sample.frame);
+        return times;
+    }
+
     /// Every time that the description promises has a sample of the channel.
-    void checkTimes(const detail::MayaCacheChannel& channel) {
-        std::vector<double> frames;
-        for (const CacheSampleFacts& sample : mFacts.samples) {
-            if (mFacts.channelNames[sample.channel] == channel.name)
-                frames.push_back(sample.frame);
-        }
+    void checkTimes(const detail::MayaCacheChannel& channel, const std::vector<double>& frames) {
         if (frames.empty()) {
-            fault(mFacts.description, 0, "channel " + channel.name + ": no sample of it");
+            fault(mFacts.description, 0, channelText(channel.name) + ": no sample of it");
             return;
         }
         if (!channel.regular || channel.samplingRate < 1)
@@ -201,7 +227,7 @@ private:
             char text[32];
             std::snprintf(text, sizeof text, "%.6g", frame);
             fault(mFacts.description, 0,
-                  "channel " + channel.name + ": no sample at frame " + text +
+                  channelText(channel.name) + ": no sample at frame " + text +
                       (missing == kMostMissing ? "; further ones are not listed" : ""));
         }
     }
@@ -209,6 +235,7 @@ private:
     CacheFacts& mFacts;
     bool mVerify;
     detail::MayaCacheDescription mDescription;
+    std::unordered_map<std::string, std::uint32_t> mChannelIndices;
 };
 
 // ---- Max ----
@@ -219,9 +246,7 @@ void readMaxFacts(const std::string& name, std::span<const char> bytes, bool ver
     facts.fileNames = {name};
     facts.channelNames = {""};
     facts.bytes = bytes.size();
-    const auto fault = [&](std::uint64_t offset, const std::string& reason) {
-        facts.faults.push_back({name, offset, reason});
-    };
+    const auto fault = [&](std::uint64_t offset, const std::string& reason) { addFault(facts, name, offset, reason); };
     if (bytes.size() < kMaxHeaderBytes) {
         fault(bytes.size(), "the file ends within its header of 32 bytes");
         return;

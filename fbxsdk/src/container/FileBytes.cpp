@@ -112,8 +112,10 @@ int readPipe(int pipe, std::span<char> memory, std::size_t& size) {
 FileBytes::~FileBytes() {
     if (mFile >= 0)
         ::close(mFile);
-    if (!mMemory.empty())
+    if (!mMemory.empty()) {
+        allow(mMemory); // whoever gets the pages next
         ::munmap(mMemory.data(), mMemory.size());
+    }
 }
 
 std::shared_ptr<const FileBytes> FileBytes::open(const std::string& fileName, FbxStatus& status) {
@@ -149,7 +151,13 @@ std::shared_ptr<const FileBytes> FileBytes::open(const std::string& fileName, Fb
         return nullptr;
     }
     opened->mSize = size;
+    forbid(isPipe ? opened->tail() : opened->mMemory);
     return opened;
+}
+
+std::span<const char> FileBytes::tail() const {
+    constexpr std::size_t kEnough = std::size_t{1} << 16; // of the gigabytes that are reserved for a pipe
+    return mMemory.subspan(mSize, std::min(kEnough, mMemory.size() - mSize));
 }
 
 bool FileBytes::contains(std::span<const char> part) const {
@@ -173,6 +181,7 @@ void FileBytes::fetch(std::span<const char> part) const {
         return;
     const std::span<char> place = mMemory.subspan(static_cast<std::size_t>(part.data() - mMemory.data()), part.size());
     preferLargePages(place);
+    allow(place);
     copy(part, place.data());
 }
 
@@ -195,10 +204,11 @@ void FileBytes::requireUnchanged() const {
 }
 
 void ReadAhead::fetchUpTo(std::size_t offset, std::size_t end) {
-    constexpr std::size_t kSmallestStep = std::size_t{1} << 10, kLargestStep = std::size_t{1} << 18;
+    // Bytes have their places from the beginning of a page on, and getting a page takes longer than filling it.
+    constexpr std::size_t kSmallestStep = std::size_t{1} << 9, kLargestStep = std::size_t{1} << 18, kPage = 1 << 12;
     mStep = offset > mEnd ? kSmallestStep : std::clamp(2 * mStep, kSmallestStep, kLargestStep);
     const std::size_t start = std::max(offset, mEnd);
-    mEnd = std::min(std::max(end, start + mStep), mBytes.size());
+    mEnd = std::min((std::max(end, start + mStep) + kPage - 1) / kPage * kPage, mBytes.size());
     mFile->fetch(mBytes.subspan(start, mEnd - start));
 }
 

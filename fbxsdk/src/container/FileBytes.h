@@ -67,6 +67,8 @@ private:
     FileBytes() = default;
 
     void copy(std::span<const char> part, char* destination) const;
+    /// Memory behind what came through a pipe.
+    [[nodiscard]] std::span<const char> tail() const;
 
     std::string mName;
     int mFile = -1; ///< none once all bytes are there

@@ -11,6 +11,17 @@
 #include <sys/mman.h>
 #include <unistd.h>
 
+#if defined(__SANITIZE_ADDRESS__)
+#define TARNELL_ADDRESS_SANITIZER
+#elif defined(__has_feature)
+#if __has_feature(address_sanitizer)
+#define TARNELL_ADDRESS_SANITIZER
+#endif
+#endif
+#ifdef TARNELL_ADDRESS_SANITIZER
+#include <sanitizer/asan_interface.h>
+#endif
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
@@ -34,6 +45,14 @@ void preferLargePages(std::span<char> bytes) {
         ::madvise(bytes.data() + (first - address), end - first, MADV_HUGEPAGE);
     }
 }
+
+#ifdef TARNELL_ADDRESS_SANITIZER
+void forbid(std::span<const char> bytes) { __asan_poison_memory_region(bytes.data(), bytes.size()); }
+void allow(std::span<const char> bytes) { __asan_unpoison_memory_region(bytes.data(), bytes.size()); }
+#else
+void forbid(std::span<const char>) {}
+void allow(std::span<const char>) {}
+#endif
 
 PageMemory::PageMemory(std::size_t size) {
     void* const memory =

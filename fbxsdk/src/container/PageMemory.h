@@ -19,6 +19,13 @@ void releasePages(std::span<const char> bytes);
 /// ones goes into getting them one by one.
 void preferLargePages(std::span<char> bytes);
 
+// Under the address sanitizer whoever looks at bytes that are not there yet is caught; elsewhere these do nothing.
+
+/// Bytes that nobody may look at until they are said to be there.
+void forbid(std::span<const char> bytes);
+/// Bytes that are there.
+void allow(std::span<const char> bytes);
+
 /// Zeroed memory of its own pages.
 class PageMemory {
 public:

@@ -27,7 +27,7 @@ inline constexpr std::size_t kMaxDepth = 64;
 inline constexpr std::size_t kShortestList = 17;
 
 /// Arrays up to so many bytes are read along with the records around them, larger ones when somebody asks for them.
-inline constexpr std::size_t kMostReadAlong = std::size_t{1} << 14;
+inline constexpr std::size_t kMostReadAlong = std::size_t{1} << 12;
 
 /// What comes through a pipe is held in memory until it has been read.
 inline constexpr std::size_t kMostPipeBytes = std::size_t{1} << 32;

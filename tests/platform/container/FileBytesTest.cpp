@@ -128,5 +128,21 @@ TEST_F(FileBytesTest, ComeThroughPipes) {
     file->requireUnchanged();
 }
 
+#if defined(__has_feature)
+#if __has_feature(address_sanitizer)
+TEST(FileBytesDeathTest, LetsTheSanitizerSeeALookAtBytesThatWereNotFetched) {
+    const support::TemporaryFolder folder;
+    FbxStatus status;
+    const auto file = FileBytes::open(folder.write("file", std::string(5000, 'x')), status);
+    ASSERT_NE(file, nullptr) << status.GetErrorString();
+    file->fetch(file->bytes().first(100));
+
+    const volatile char* const bytes = file->bytes().data();
+    EXPECT_EQ(bytes[99], 'x');
+    EXPECT_DEATH((void)(bytes[104] == 'x'), "use-after-poison");
+}
+#endif
+#endif
+
 } // namespace
 } // namespace fbxsdk::detail

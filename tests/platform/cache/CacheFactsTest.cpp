@@ -1,0 +1,82 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The inspection of caches that claim more than anybody wants to read: its time and memory grow with the file alone.
+#include <fbxsdk/extensions/CacheFacts.h>
+
+#include <algorithm>
+#include <cmath>
+#include <limits>
+#include <string>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "cache/MayaCacheData.h"
+#include "support/TemporaryFolder.h"
+
+using namespace fbxsdk;
+
+namespace {
+
+constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
+
+std::string dataOf(const std::vector<detail::MayaCacheWriteBlock>& blocks) {
+    const std::int32_t ticks = 0;
+    return detail::mayaCacheHeader(/*wide=*/false, 0, 1) + detail::mayaCacheFrame(/*wide=*/false, &ticks, blocks);
+}
+
+extensions::CacheFacts factsOf(const std::string& file) {
+    extensions::CacheFacts facts;
+    FbxStatus status;
+    EXPECT_TRUE(extensions::readCacheFacts(file.c_str(), /*verify=*/true, facts, status)) << status.GetErrorString();
+    return facts;
+}
+
+TEST(CacheFacts, TellsAHundredThousandChannelsApart) {
+    constexpr std::size_t kChannels = 100'000; // each looked for among all takes a minute
+    const std::vector<double> point = {1, 2, 3};
+    std::vector<std::string> names;
+    for (std::size_t i = 0; i < kChannels; ++i)
+        names.push_back("channel" + std::to_string(i));
+    std::vector<detail::MayaCacheWriteBlock> blocks;
+    for (const std::string& name : names)
+        blocks.push_back({name, point});
+    const support::TemporaryFolder folder;
+
+    const auto facts = factsOf(folder.write("many.mc", dataOf(blocks)));
+
+    EXPECT_EQ(facts.channelNames, names);
+    EXPECT_TRUE(facts.faults.empty());
+}
+
+TEST(CacheFacts, ListsAThousandFaultsAndSaysThatThereAreMore) {
+    const std::vector<double> point = {kNaN, 2, 3};
+    const std::string longName(1'000'000, 'n'); // in each of the faults it would be gigabytes
+    const std::vector<detail::MayaCacheWriteBlock> blocks(5000, {"a", point});
+    const support::TemporaryFolder folder;
+    std::string data = dataOf(blocks);
+    data +=
+        detail::mayaCacheFrame(/*wide=*/false, nullptr, std::vector<detail::MayaCacheWriteBlock>{{longName, point}});
+
+    const auto facts = factsOf(folder.write("bad.mc", data));
+
+    ASSERT_EQ(facts.faults.size(), 1000U);
+    EXPECT_THAT(facts.faults.front().reason, testing::EndsWith("channel a: a number that is not finite"));
+    EXPECT_THAT(facts.faults.back().reason, testing::EndsWith("further ones are not listed"));
+}
+
+TEST(CacheFacts, ShortensLongNamesInFaultsOnly) {
+    const std::vector<double> point = {kNaN, 2, 3};
+    const std::string longName(1'000'000, 'n');
+    const support::TemporaryFolder folder;
+
+    const auto facts = factsOf(folder.write("long.mc", dataOf({{longName, point}})));
+
+    ASSERT_EQ(facts.faults.size(), 1U);
+    EXPECT_LT(facts.faults.front().reason.size(), 300U);
+    EXPECT_THAT(facts.channelNames, testing::ElementsAre(longName));
+}
+
+} // namespace
