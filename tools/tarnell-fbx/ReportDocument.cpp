@@ -16,6 +16,19 @@ using namespace Tarnell::Fbx;
 
 namespace {
 
+/// What orthographic cameras see at a zoom of 1, centimetres.
+constexpr double kOrthoWidth = 30.0;
+
+/// Width by height of the picture; where the file fixes one of them, the other is given in parts of it.
+double pictureAspect(const FbxCamera& camera) {
+    const double width = camera.AspectWidth.Get(), height = camera.AspectHeight.Get();
+    const auto mode = camera.AspectRatioMode.Get();
+    const double aspect = mode == FbxCamera::eFixedWidth    ? 1.0 / height
+                          : mode == FbxCamera::eFixedHeight ? width
+                                                            : width / height;
+    return aspect * camera.PixelAspectRatio.Get();
+}
+
 class DocumentPrinter {
 public:
     DocumentPrinter(const ReportScene& scene, ReportArrays& arrays, JsonWriter& json)
@@ -156,12 +169,9 @@ private:
                                                           "fill", "overscan", "stretch"};
             const auto fit = static_cast<std::size_t>(attribute->GateFit.Get());
             mJson.text("gateFit", fit < kFits.size() ? kFits[fit] : kFits[0]);
-            mJson.integer("aspectMode", static_cast<long long>(attribute->AspectRatioMode.Get()));
-            mJson.real("aspectWidth", attribute->AspectWidth.Get());
-            mJson.real("aspectHeight", attribute->AspectHeight.Get());
-            mJson.real("pixelAspect", attribute->PixelAspectRatio.Get());
+            mJson.real("pictureAspect", pictureAspect(*attribute));
             mJson.real("squeeze", attribute->FilmSqueezeRatio.Get());
-            mJson.real("orthoZoom", attribute->OrthoZoom.Get());
+            mJson.real("orthoWidth", kOrthoWidth * attribute->OrthoZoom.Get());
             mJson.text("target", node.GetTarget() ? node.GetTarget()->GetName() : "");
         }
         mJson.endObject();

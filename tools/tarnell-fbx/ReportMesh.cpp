@@ -9,6 +9,7 @@
 #include <limits>
 #include <numeric>
 #include <unordered_map>
+#include <utility>
 
 namespace tool {
 namespace {
@@ -23,6 +24,7 @@ bool isFinite(const Point& point) {
 struct Corner {
     double x, y;
     std::uint32_t point;
+    std::uint32_t before, after; ///< its neighbours among those that are left
 };
 
 /// Twice the area of the triangle; positive when it goes round against the clock.
@@ -46,52 +48,115 @@ std::vector<Corner> flattened(const std::vector<std::uint32_t>& polygon, const s
         axis = std::abs(normal[k]) > std::abs(normal[axis]) ? k : axis;
     const std::size_t u = (axis + 1) % 3, v = (axis + 2) % 3;
     const double side = normal[axis] < 0.0 ? -1.0 : 1.0;
+    const auto count = static_cast<std::uint32_t>(polygon.size());
     std::vector<Corner> corners;
-    corners.reserve(polygon.size());
-    for (const std::uint32_t point : polygon)
-        corners.push_back({points[point][u] * side, points[point][v], point});
+    corners.reserve(count);
+    for (std::uint32_t i = 0; i < count; ++i) {
+        const Point& point = points[polygon[i]];
+        corners.push_back({point[u] * side, point[v], polygon[i], (i + count - 1) % count, (i + 1) % count});
+    }
     return corners;
 }
 
-bool isEar(const std::vector<Corner>& corners, std::size_t i) {
-    const std::size_t count = corners.size();
-    const Corner& a = corners[(i + count - 1) % count];
-    const Corner& b = corners[i];
-    const Corner& c = corners[(i + 1) % count];
-    if (turn(a, b, c) <= 0.0)
+/// Corners at which a polygon turns inwards, by their places: nothing else can lie in an ear.
+class InwardCorners {
+public:
+    explicit InwardCorners(const std::vector<Corner>& corners) : mCorners(corners) {
+        mLow = mHigh = {corners[0].x, corners[0].y};
+        for (const Corner& corner : corners) {
+            mLow = {std::min(mLow[0], corner.x), std::min(mLow[1], corner.y)};
+            mHigh = {std::max(mHigh[0], corner.x), std::max(mHigh[1], corner.y)};
+        }
+        mSide = static_cast<std::size_t>(std::sqrt(static_cast<double>(corners.size()))) + 1;
+        mCells.resize(mSide * mSide);
+        for (std::uint32_t i = 0; i < corners.size(); ++i) {
+            if (turn(corners[corners[i].before], corners[i], corners[corners[i].after]) < 0.0)
+                mCells[column(corners[i].y, 1) * mSide + column(corners[i].x, 0)].push_back(i);
+        }
+    }
+
+    /// Whether any lies in the triangle; those on its edge count unless `withinOnly`.
+    [[nodiscard]] bool anyIn(const Corner& a, const Corner& b, const Corner& c, bool withinOnly) const {
+        const auto [left, right] = std::minmax({a.x, b.x, c.x});
+        const auto [bottom, top] = std::minmax({a.y, b.y, c.y});
+        for (std::size_t y = column(bottom, 1); y <= column(top, 1); ++y) {
+            for (std::size_t x = column(left, 0); x <= column(right, 0); ++x) {
+                for (const std::uint32_t i : mCells[y * mSide + x]) {
+                    if (isIn(i, a, b, c, withinOnly))
+                        return true;
+                }
+            }
+        }
         return false;
-    return std::none_of(corners.begin(), corners.end(), [&](const Corner& p) {
-        const bool isCorner = p.point == a.point || p.point == b.point || p.point == c.point;
-        return !isCorner && turn(a, b, p) >= 0.0 && turn(b, c, p) >= 0.0 && turn(c, a, p) >= 0.0;
-    });
+    }
+
+private:
+    [[nodiscard]] std::size_t column(double place, std::size_t axis) const {
+        const double length = mHigh[axis] - mLow[axis];
+        const double part = length > 0.0 ? (place - mLow[axis]) / length : 0.0;
+        return std::min(mSide - 1, static_cast<std::size_t>(part * static_cast<double>(mSide)));
+    }
+
+    [[nodiscard]] bool isIn(std::uint32_t i, const Corner& a, const Corner& b, const Corner& c, bool withinOnly) const {
+        const Corner& p = mCorners[i];
+        if (p.before == i || p.point == a.point || p.point == b.point || p.point == c.point) // cut off, or one of them
+            return false;
+        const double least = std::min({turn(a, b, p), turn(b, c, p), turn(c, a, p)});
+        return withinOnly ? least > 0.0 : least >= 0.0;
+    }
+
+    const std::vector<Corner>& mCorners;
+    std::array<double, 2> mLow{}, mHigh{};
+    std::size_t mSide = 1;
+    std::vector<std::vector<std::uint32_t>> mCells;
+};
+
+/// Takes a corner out of the polygon; one that names itself is gone.
+std::uint32_t remove(std::vector<Corner>& corners, std::uint32_t i) {
+    const auto [before, after] = std::pair(corners[i].before, corners[i].after);
+    corners[before].after = after;
+    corners[after].before = before;
+    corners[i].before = corners[i].after = i;
+    return after;
 }
 
 void cutEars(std::vector<Corner> corners, std::vector<Triangle>& triangles) {
-    std::size_t i = 0, refused = 0;
-    while (corners.size() > 3) {
-        const std::size_t count = corners.size();
-        i %= count;
-        // Polygons that cross themselves have no ears at some point: any corner will do then.
-        if (refused < count && !isEar(corners, i)) {
-            ++i, ++refused;
+    const InwardCorners inward(corners);
+    // Polygons that touch or cross themselves have no clear ears at some point: then one that others touch will do, and
+    // at last any corner.
+    enum { clear, touched, any } wanted = clear;
+    std::uint32_t i = 0;
+    std::size_t left = corners.size(), refused = 0;
+    while (left > 3) {
+        const Corner& a = corners[corners[i].before];
+        const Corner& b = corners[i];
+        const Corner& c = corners[b.after];
+        const double area = turn(a, b, c);
+        const bool isEar = area > 0.0 && !inward.anyIn(a, b, c, wanted == touched);
+        if (isEar || area == 0.0 || wanted == any) { // a corner on a straight line goes without a triangle
+            if (area != 0.0)
+                triangles.push_back({a.point, b.point, c.point});
+            i = remove(corners, i);
+            --left;
+            refused = 0;
+            wanted = clear;
             continue;
         }
-        triangles.push_back({corners[(i + count - 1) % count].point, corners[i].point, corners[(i + 1) % count].point});
-        corners.erase(corners.begin() + static_cast<std::ptrdiff_t>(i));
+        i = b.after;
+        if (++refused < left)
+            continue;
         refused = 0;
+        wanted = wanted == clear ? touched : any;
     }
-    triangles.push_back({corners[0].point, corners[1].point, corners[2].point});
+    triangles.push_back({corners[corners[i].before].point, corners[i].point, corners[corners[i].after].point});
 }
 
 void cut(const std::vector<std::uint32_t>& polygon, const std::vector<Point>& points,
          std::vector<Triangle>& triangles) {
-    constexpr std::size_t kMostCorners = 3000; // cutting takes their square
-    if (polygon.size() > 3 && polygon.size() <= kMostCorners) {
+    if (polygon.size() == 3)
+        triangles.push_back({polygon[0], polygon[1], polygon[2]});
+    else
         cutEars(flattened(polygon, points), triangles);
-        return;
-    }
-    for (std::size_t i = 1; i + 1 < polygon.size(); ++i)
-        triangles.push_back({polygon[0], polygon[i], polygon[i + 1]});
 }
 
 /// Names the points that triangles use in the order of their numbers, and has the triangles name places among them.

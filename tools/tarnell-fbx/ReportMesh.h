@@ -27,7 +27,7 @@ struct ReportMesh {
     [[nodiscard]] bool isThinned() const { return triangles.size() < triangleCount; }
 };
 
-/// Concave polygons are cut along their form, up to a number of corners at which that would take too long.
+/// Polygons may be concave.
 ReportMesh triangulated(const Tarnell::Fbx::TnFbxMesh& mesh);
 
 /// Makes one point of those that are close to each other, until no more triangles than that are left.

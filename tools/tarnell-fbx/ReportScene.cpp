@@ -24,13 +24,14 @@ namespace {
 
 /// A browser opens pages of this many numbers at once, and turns their scenes without a jerk.
 constexpr std::size_t kMostSamples = 3'000'000;
+constexpr int kMostFrames = 100'000;
 constexpr std::size_t kMostTriangles = 250'000;
 constexpr std::size_t kMostMovingPoints = 600'000;
 /// Transforms of nodes that are evaluated for one kind of object: a few seconds.
 constexpr double kMostEvaluations = 4e6;
 /// Every moment of moving points reads the file once more.
-constexpr int kMostMoments = 48;
-constexpr std::uintmax_t kMostBytesReadAgain = std::uintmax_t{400} << 20U;
+constexpr int kMostMoments = 250;
+constexpr std::uintmax_t kMostBytesReadAgain = std::uintmax_t{256} << 20U;
 
 FbxTimeSpan spanOf(FbxScene& scene, FbxAnimStack* stack) {
     FbxTimeSpan span = stack->GetLocalTimeSpan();
@@ -168,9 +169,10 @@ void ReportScene::boundFrames(const ReportWishes& wishes) {
         first = std::min(first, last);
     }
     const auto frames = static_cast<std::size_t>((last - first) / mSampleStep + 1);
-    const auto stride = static_cast<int>((frames * moving + kMostSamples - 1) / kMostSamples);
+    const std::size_t numbers = std::max(frames * moving * kMostFrames, frames * kMostSamples);
+    const auto stride = static_cast<int>((numbers - 1) / (kMostSamples * kMostFrames) + 1);
     mFrames.first = first;
-    mFrames.step = mSampleStep * std::max(1, stride);
+    mFrames.step = mSampleStep * stride;
     mFrames.count = (last - first) / mFrames.step + 1;
     if (mFrames.step > 1)
         note("Of its " + std::to_string(all) + " frames the report shows every " + std::to_string(mFrames.step) +

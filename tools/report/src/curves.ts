@@ -49,7 +49,7 @@ export class Curves {
   constructor(store: Store) {
     this.store = store;
     store.listen((change) => {
-      if (change === "frame") for (const plot of this.plots) plot.redraw(false, false);
+      if (change === "frame") for (const plot of this.plots) this.follow(plot);
       else if (change !== "view") this.draw();
     });
     new ResizeObserver(() => this.fit()).observe(this.element);
@@ -106,6 +106,11 @@ export class Curves {
     return new uPlot(options, [frames, ...samples.map(gaps)], parent);
   }
 
+  private follow(plot: uPlot): void {
+    plot.setLegend({ idx: this.store.frame });
+    plot.redraw(false, false);
+  }
+
   private drawFrame(plot: uPlot): void {
     const x = Math.round(plot.valToPos(this.store.shot.frameAt(this.store.frame), "x", true));
     plot.ctx.save();
@@ -120,6 +125,7 @@ export class Curves {
 
   /** A click, or a drag, goes to the frame below it. */
   private listenTo(plot: uPlot): void {
+    plot.setLegend({ idx: this.store.frame });
     const go = (event: PointerEvent) => {
       if (event.buttons !== 1) return;
       this.store.setFrame(plot.posToIdx(event.clientX - plot.over.getBoundingClientRect().left));

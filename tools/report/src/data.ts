@@ -10,12 +10,11 @@ export interface CameraData {
   orthographic: boolean;
   drivenBy: string;
   gateFit?: string;
-  aspectMode?: number;
-  aspectWidth?: number | null;
-  aspectHeight?: number | null;
-  pixelAspect?: number | null;
+  /** Of the picture; nothing sensible where the picture is the film. */
+  pictureAspect?: number | null;
   squeeze?: number | null;
-  orthoZoom?: number | null;
+  /** Of the picture of an orthographic camera, centimetres. */
+  orthoWidth?: number | null;
   target?: string;
 }
 

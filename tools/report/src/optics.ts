@@ -6,9 +6,6 @@
 import type { NodeData, Shot } from "./data.ts";
 
 export const MILLIMETRES_PER_INCH = 25.4;
-/** The width, in centimetres, that an orthographic camera sees at a zoom of 1: 30 units in files of every program seen. */
-const ORTHO_WIDTH = 30;
-
 export interface Size {
   width: number;
   height: number;
@@ -54,31 +51,13 @@ export function pictureGate(film: Size, pictureAspect: number, fit: string): Siz
   }
 }
 
-/** Of cameras whose picture has the shape of the window, that of the film. */
-function pictureAspectOf(node: NodeData, film: Size): number {
-  const camera = node.camera;
-  const width = camera?.aspectWidth ?? 0;
-  const height = camera?.aspectHeight ?? 0;
-  const pixel = camera?.pixelAspect || 1;
-  const filmAspect = film.width / film.height;
-  switch (camera?.aspectMode) {
-    case 1: // a ratio
-    case 2: // a resolution
-      return width > 0 && height > 0 ? (width * pixel) / height : filmAspect;
-    case 3: // the width in pixels, the height in parts of it
-      return height > 0 ? pixel / height : filmAspect;
-    case 4: // the height in pixels, the width in parts of it
-      return width > 0 ? width * pixel : filmAspect;
-    default:
-      return filmAspect;
-  }
-}
-
 export function opticsOf(shot: Shot, node: NodeData, frame: number): Optics {
   const value = (name: string) => shot.value(node, name, frame);
   const film = { width: value("apertureWidth"), height: value("apertureHeight") };
   const focalLength = value("focalLength");
-  const pictureAspect = pictureAspectOf(node, film);
+  const filmAspect = film.width / film.height;
+  const stated = node.camera?.pictureAspect ?? 0;
+  const pictureAspect = stated > 0 ? stated : filmAspect;
   const gate = pictureGate(film, pictureAspect, node.camera?.gateFit ?? "none");
   return {
     orthographic: node.camera?.orthographic ?? false,
@@ -91,7 +70,7 @@ export function opticsOf(shot: Shot, node: NodeData, frame: number): Optics {
     pictureAngles: { width: angleOver(gate.width, focalLength), height: angleOver(gate.height, focalLength) },
     near: value("nearPlane"),
     far: value("farPlane"),
-    orthoWidth: ORTHO_WIDTH * (node.camera?.orthoZoom ?? 1),
+    orthoWidth: node.camera?.orthoWidth ?? NaN,
   };
 }
 

@@ -132,7 +132,6 @@ export class View {
   private open(): void {
     const shot = this.store.shot;
     this.surfaces.open(shot);
-    this.surfaces.place(shot, 0);
     this.measure();
     this.scene.remove(...(this.grid ? [this.grid] : []));
     const cell = round(this.radius / 4);
@@ -145,8 +144,12 @@ export class View {
   private measure(): void {
     const shot = this.store.shot;
     this.bounds.makeEmpty();
-    this.scene.updateMatrixWorld(true);
-    for (const mesh of this.surfaces.group.children) if (mesh.visible) this.bounds.expandByObject(mesh);
+    const last = shot.frameCount - 1;
+    for (const frame of new Set([last, Math.floor(last / 2), 0])) {
+      this.surfaces.place(shot, frame);
+      this.scene.updateMatrixWorld(true);
+      for (const mesh of this.surfaces.group.children) if (mesh.visible) this.bounds.expandByObject(mesh);
+    }
     const meshes = this.bounds.clone();
     const reach = meshes.isEmpty() ? Infinity : meshes.getSize(new Vector3()).length() * 8;
     const middle = meshes.isEmpty() ? new Vector3() : meshes.getCenter(new Vector3());
@@ -164,7 +167,8 @@ export class View {
     const { shot, frame, visible } = this.store;
     this.surfaces.place(shot, frame);
     this.surfaces.group.visible = visible.meshes;
-    this.surfaces.paint(this.colour("--mesh"), this.colour("--chosen"), this.store.selected, visible.wires);
+    const base = this.colour("--mesh");
+    this.surfaces.paint(base, base.clone().lerp(this.colour("--chosen"), 0.4), this.store.selected, visible.wires);
     if (this.grid) {
       this.grid.visible = visible.grid;
       const colour = this.colour("--grid");
