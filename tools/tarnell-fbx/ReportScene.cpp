@@ -6,6 +6,7 @@
 #include "ReportScene.h"
 
 #include <algorithm>
+#include <bit>
 #include <cmath>
 #include <cstring>
 #include <filesystem>
@@ -87,6 +88,13 @@ std::string counted(std::size_t count, const char* one, const char* many) {
     return std::to_string(count) + ' ' + (count == 1 ? one : many);
 }
 
+/// The least power of two from a number on: parts of a frame, and of most rates, by one are exact, and so the moment of
+/// a frame is the same at each of these rates.
+int powerOfTwoFrom(int number) {
+    return static_cast<int>(std::bit_ceil(static_cast<unsigned>(std::clamp(number, 1, 1 << 30))));
+}
+bool isExact(double rate) { return static_cast<double>(static_cast<float>(rate)) == rate; }
+
 /// So many places among `count`, evenly spread, the first and the last among them.
 std::vector<int> spread(int wanted, int count) {
     std::vector<int> places;
@@ -115,9 +123,7 @@ ReportScene::ReportScene(const std::string& file, const ReportWishes& wishes) : 
     mInfo.setAnimationStackName(wishes.take);
     mInfo.setGlobalTransform(true);
     mInfo.setTransformPoints(false); // the transforms of their nodes move them
-    mInfo.setUseSampleFPS(mSampleStep > 1);
-    mInfo.setSampleFPS(static_cast<float>(mFrames.rate / mSampleStep));
-    mInfo.setFrame(static_cast<float>(mFrames.first) / static_cast<float>(mSampleStep));
+    readEvery(mSampleStep, mFrames.first);
     mTransforms = read<TnFbxTransform>(&Tarnell::Fbx::Fbx::getTransforms);
     mCameras = read<TnFbxCamera>(&Tarnell::Fbx::Fbx::getCameras);
     mLights = read<TnFbxLight>(&Tarnell::Fbx::Fbx::getLights);
@@ -140,7 +146,7 @@ void ReportScene::chooseFrames(const ReportWishes& wishes) {
     mFrames.first = range.first;
     mFrames.count = range.second - range.first + 1;
     const double nodes = std::max(1, mOpened.scene().GetNodeCount());
-    mSampleStep = std::max(1, static_cast<int>(std::ceil(mFrames.count * nodes / kMostEvaluations)));
+    mSampleStep = powerOfTwoFrom(static_cast<int>(std::min(std::ceil(mFrames.count * nodes / kMostEvaluations), 1e9)));
 }
 
 /// Picks frames among those that were read: the ones that were wished for, and no more than a page can carry.
@@ -195,11 +201,13 @@ ReportScene::Objects<Object> ReportScene::read(Reader<Object> reader) {
 }
 
 void ReportScene::readOneMoment(int frame) {
-    // At a rate of one sample or two for the whole clip, the frame is a fraction.
-    const int length = std::max(1, mFrames.count * std::max(1, mFrames.step));
-    mInfo.setUseSampleFPS(true);
-    mInfo.setSampleFPS(static_cast<float>(mFrames.rate / length));
-    mInfo.setFrame(static_cast<float>(static_cast<double>(frame) / length));
+    readEvery(isExact(mFrames.rate) ? powerOfTwoFrom(mFrames.count * mFrames.step) : mSampleStep, frame);
+}
+
+void ReportScene::readEvery(int step, int frame) {
+    mInfo.setUseSampleFPS(step > 1);
+    mInfo.setSampleFPS(static_cast<float>(mFrames.rate / step));
+    mInfo.setFrame(static_cast<float>(frame) / static_cast<float>(step));
 }
 
 /// The next object of a kind, which is what the node carries.

@@ -87,7 +87,9 @@ private:
     void boundFrames(const ReportWishes& wishes);
     template <class Object>
     Objects<Object> read(Reader<Object> reader);
-    /// Options that read at one moment and sample next to nothing.
+    /// Options that sample every so-manyth frame, and read static values and meshes at a frame.
+    void readEvery(int step, int frame);
+    /// Options that read at one moment and, where that can be done exactly, sample next to nothing.
     void readOneMoment(int frame);
     template <class Object>
     Object* next(Objects<Object>& objects, const FbxNode& node);

@@ -95,10 +95,16 @@ export class Curves {
       scales: { x: { time: false } },
       cursor: { y: false, drag: { x: false, y: false }, sync: { key: "frames" } },
       legend: { live: true },
-      axes: [{ ...axis, size: 28 }, { ...axis, size: 62 }],
+      axes: [{ ...axis, size: 28, values: (_, frames) => frames.map((frame) => number(frame)) }, { ...axis, size: 62 }],
       series: [
-        { label: "frame" },
-        ...labels.map((label, i) => ({ label, stroke: inks[i % inks.length]!, width: 1.5, points: { show: false } })),
+        { label: "frame", value: (_, frame: number | null) => number(frame) },
+        ...labels.map((label, i) => ({
+          label,
+          stroke: inks[i % inks.length]!,
+          width: 1.5,
+          points: { show: false },
+          value: (_: uPlot, value: number | null) => number(value, 4),
+        })),
       ],
       hooks: { draw: [(plot) => this.drawFrame(plot)], ready: [(plot) => this.listenTo(plot)] },
     };
