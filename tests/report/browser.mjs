@@ -287,7 +287,7 @@ test("a file of 20 MB opens in two seconds", async (context) => {
 });
 
 test("the picture that the README shows", async () => {
-  const { page } = await open(write("shot", shot), { theme: "light", width: 1000, height: 640 });
+  const { page } = await open(write("shot", shot), { width: 1200, height: 720 });
   await page.keyboard.press("1");
   await setSlider(page, 12);
   await new Promise((resolve) => setTimeout(resolve, 300));

@@ -139,7 +139,7 @@ std::string unknownCommand(const CLI::App& app, const std::string& word) {
     if (word.empty() || word.front() == '-' || std::find(names.begin(), names.end(), word) != names.end())
         return {};
     if (word == "report")
-        return "this build has no reports: npm was not there to make their page";
+        return "this build has no reports: it was made without npm";
     std::string answer = "there is no command \"" + word + '"';
     const std::vector<std::string> similar = tool::mostSimilar(word, names);
     for (std::size_t i = 0; i < similar.size(); ++i)

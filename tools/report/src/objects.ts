@@ -10,7 +10,7 @@ export class ObjectList {
   readonly element: HTMLElement;
   private readonly store: Store;
   private readonly search = make("input", { type: "search", id: "search", placeholder: "Find", "aria-label": "Find objects by name" });
-  private readonly list = make("select", { size: "9", id: "objects", "aria-label": "Objects" });
+  private readonly list = make("select", { size: "5", id: "objects", "aria-label": "Objects" });
 
   constructor(store: Store) {
     this.store = store;
