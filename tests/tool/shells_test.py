@@ -13,14 +13,16 @@ import unittest
 from support import run
 
 COMMANDS = ("info", "tree", "props", "curve", "cache", "records", "dump", "convert", "completion")
-if run("help", "report").returncode == 0: # a build without npm goes without it
-    COMMANDS = (*COMMANDS, "report")
 
 
 def options_of(command):
     """The long options in a command's help."""
     return sorted(set(re.findall(r"--[a-z][a-z-]*", run(command, "--help").stdout.split("Options:")[1])) - {"--strict"}
                   | ({"--strict"} if command == "convert" else set()))
+
+
+if run("help", "report").returncode == 0: # a build without npm goes without it
+    COMMANDS = (*COMMANDS, "report")
 
 
 def bash(line):

@@ -86,14 +86,6 @@ struct RecordsOptions : LookOptions {
     int values = 8;   ///< shown of a list; 0: all
 };
 
-struct ReportOptions {
-    std::vector<std::string> files; ///< names and patterns
-    std::string output;             ///< "-": standard output
-    std::string take;
-    std::optional<std::pair<int, int>> frames; ///< only these
-    bool force = false;                        ///< also over what is no report
-};
-
 /// The names of the kinds that dump knows, in the order in which it prints them.
 const std::vector<std::string>& dumpKinds();
 
@@ -105,6 +97,15 @@ int props(const PropsOptions& options);
 int curve(const CurveOptions& options);
 int cache(const CacheOptions& options);
 int records(const RecordsOptions& options);
+
+struct ReportOptions {
+    std::vector<std::string> files; ///< names and patterns
+    std::string output;             ///< "-": standard output
+    std::string take;
+    std::optional<std::pair<int, int>> frames; ///< only these
+    bool force = false;                        ///< also over what is no report
+};
+
 int report(const ReportOptions& options); ///< not in builds without npm
 
 /// The text as it is shown to people: without anything that a terminal would obey.
