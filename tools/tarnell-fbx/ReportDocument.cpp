@@ -16,7 +16,7 @@ using namespace Tarnell::Fbx;
 
 namespace {
 
-/// What orthographic cameras see at a zoom of 1, centimetres.
+/// What orthographic cameras see at a zoom of 1, units of the file.
 constexpr double kOrthoWidth = 30.0;
 
 /// Width by height of the picture; where the file fixes one of them, the other is given in parts of it.
@@ -171,7 +171,7 @@ private:
             mJson.text("gateFit", fit < kFits.size() ? kFits[fit] : kFits[0]);
             mJson.real("pictureAspect", pictureAspect(*attribute));
             mJson.real("squeeze", attribute->FilmSqueezeRatio.Get());
-            mJson.real("orthoWidth", kOrthoWidth * attribute->OrthoZoom.Get());
+            mJson.real("orthoWidth", kOrthoWidth * unit() * attribute->OrthoZoom.Get());
             mJson.text("target", node.GetTarget() ? node.GetTarget()->GetName() : "");
         }
         mJson.endObject();
@@ -207,6 +207,11 @@ private:
             narrow.push_back(
                 {static_cast<Index>(triangle[0]), static_cast<Index>(triangle[1]), static_cast<Index>(triangle[2])});
         return mArrays.add(narrow);
+    }
+
+    /// Of the file, centimetres.
+    [[nodiscard]] double unit() const {
+        return mScene.opened().scene().GetGlobalSettings().GetSystemUnit().GetScaleFactor();
     }
 
     const ReportScene& mScene;

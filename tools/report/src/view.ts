@@ -79,7 +79,7 @@ export class View {
   /** Everything at once, seen from above and aside. */
   frameAll(): void {
     const centre = this.bounds.getCenter(new Vector3());
-    this.outside.position.copy(centre).add(new Vector3(0.9, 0.6, 1.2).normalize().multiplyScalar(this.radius * 2.6));
+    this.outside.position.copy(centre).add(new Vector3(0.9, 0.6, 1.2).normalize().multiplyScalar(this.radius * 2.6 * Math.max(1, 1 / this.aspect())));
     this.outside.near = this.radius / 1000;
     this.outside.far = this.radius * 1000;
     if (this.controls) {
@@ -102,6 +102,10 @@ export class View {
     this.outside.position.copy(target).add(away.multiplyScalar(closer));
     this.controls.update();
     this.renderSoon();
+  }
+
+  private aspect(): number {
+    return this.element.clientWidth / this.element.clientHeight || 1;
   }
 
   /** At once, for printers. */
