@@ -21,6 +21,10 @@ def options_of(command):
                   | ({"--strict"} if command == "convert" else set()))
 
 
+if run("help", "report").returncode == 0: # a build without npm goes without it
+    COMMANDS = (*COMMANDS, "report")
+
+
 def bash(line):
     """What bash offers behind a line."""
     script = ('source /dev/stdin; COMP_WORDS=("$@"); COMP_CWORD=$(($# - 1)); _tarnell_fbx; '

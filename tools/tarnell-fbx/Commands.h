@@ -98,6 +98,16 @@ int curve(const CurveOptions& options);
 int cache(const CacheOptions& options);
 int records(const RecordsOptions& options);
 
+struct ReportOptions {
+    std::vector<std::string> files; ///< names and patterns
+    std::string output;             ///< "-": standard output
+    std::string take;
+    std::optional<std::pair<int, int>> frames; ///< only these
+    bool force = false;                        ///< also over what is no report
+};
+
+int report(const ReportOptions& options); ///< not in builds without npm
+
 /// The text as it is shown to people: without anything that a terminal would obey.
 std::string spoken(const std::string& text);
 

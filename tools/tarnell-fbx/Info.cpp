@@ -12,6 +12,7 @@
 
 #include "CacheCheck.h"
 #include "Commands.h"
+#include "Info.h"
 #include "SceneFacts.h"
 #include "SceneFile.h"
 #include "ShowFiles.h"
@@ -281,6 +282,10 @@ void printJson(const Facts& facts, JsonWriter& json) {
 }
 
 } // namespace
+
+void printInfo(const std::string& file, const SceneFile& opened, JsonWriter& json) {
+    printJson(factsOf(file, opened), json);
+}
 
 int info(const LookOptions& options) {
     return showFiles(options, "info", [](Page& page) -> int {

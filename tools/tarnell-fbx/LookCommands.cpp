@@ -139,6 +139,22 @@ void addRecords(CLI::App& app, std::function<int()>& chosen) {
     addCount(*command, "--values", options->values, 0, "So many values of a list (8); 0: all");
 }
 
+#ifdef TARNELL_FBX_REPORT
+void addReport(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] =
+        addCommand<ReportOptions>(app, chosen, "report", "Write files as one page for a browser", report);
+    command->add_option("FILE", options->files, "FBX files, or patterns of names")->required()->type_name("");
+    command->add_option("-o,--output", options->output, "The page to write; - for standard output")
+        ->required()
+        ->type_name("PAGE");
+    addFrames(*command, options->frames, "Only the frames from A to B");
+    addTake(*command, options->take);
+    command->add_flag("--force", options->force, "Overwrite the page also where it is no report");
+}
+#else
+void addReport(CLI::App&, std::function<int()>&) {} // main says why
+#endif
+
 } // namespace
 
 void addFrames(CLI::App& command, std::optional<std::pair<int, int>>& frames, const char* help) {
@@ -163,6 +179,7 @@ void addLookCommands(CLI::App& app, std::function<int()>& chosen) {
     addCurve(app, chosen);
     addCache(app, chosen);
     addRecords(app, chosen);
+    addReport(app, chosen);
 }
 
 } // namespace tool

@@ -13,7 +13,8 @@
 
 namespace tool {
 
-/// Adds info, tree, props, curve, cache and records. The one that is parsed leaves its work in `chosen`.
+/// Adds info, tree, props, curve, cache, records and, where it was built, report. The one that is parsed leaves its
+/// work in `chosen`.
 void addLookCommands(CLI::App& app, std::function<int()>& chosen);
 
 /// "--frames A:B", or a single frame.

@@ -1,0 +1,242 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The document of one file in a report. docs/report.md says what stands in it.
+#include <array>
+#include <cmath>
+
+#include "Commands.h"
+#include "Info.h"
+#include "ReportPage.h"
+#include "SceneFacts.h"
+
+namespace tool {
+
+using namespace Tarnell::Fbx;
+
+namespace {
+
+/// What orthographic cameras see at a zoom of 1, units of the file.
+constexpr double kOrthoWidth = 30.0;
+
+/// Width by height of the picture; where the file fixes one of them, the other is given in parts of it.
+double pictureAspect(const FbxCamera& camera) {
+    const double width = camera.AspectWidth.Get(), height = camera.AspectHeight.Get();
+    const auto mode = camera.AspectRatioMode.Get();
+    const double aspect = mode == FbxCamera::eFixedWidth    ? 1.0 / height
+                          : mode == FbxCamera::eFixedHeight ? width
+                                                            : width / height;
+    return aspect * camera.PixelAspectRatio.Get();
+}
+
+class DocumentPrinter {
+public:
+    DocumentPrinter(const ReportScene& scene, ReportArrays& arrays, JsonWriter& json)
+        : mScene(scene), mArrays(arrays), mJson(json) {}
+
+    void frames() {
+        const ReportFrames& frames = mScene.frames();
+        mJson.key("frames");
+        mJson.beginObject();
+        mJson.real("rate", frames.rate);
+        mJson.integer("first", frames.first);
+        mJson.integer("step", frames.step);
+        mJson.integer("count", frames.count);
+        mJson.endObject();
+        mJson.key("shapeFrames");
+        mJson.beginArray();
+        for (const int place : mScene.shapeFrames())
+            mJson.integer(place);
+        mJson.endArray();
+    }
+
+    void nodes() {
+        mJson.key("nodes");
+        mJson.beginArray();
+        for (const ReportNode& node : mScene.nodes()) {
+            mJson.beginObject();
+            print(node);
+            mJson.endObject();
+        }
+        mJson.endArray();
+    }
+
+    void shapes() {
+        mJson.key("meshes");
+        mJson.beginArray();
+        for (const ReportShape& shape : mScene.shapes()) {
+            mJson.beginObject();
+            print(shape);
+            mJson.endObject();
+        }
+        mJson.endArray();
+    }
+
+    void sentences(const char* key, const std::vector<std::string>& sentences) {
+        mJson.key(key);
+        mJson.beginArray();
+        for (const std::string& sentence : sentences)
+            mJson.text(sentence);
+        mJson.endArray();
+    }
+
+private:
+    void print(const ReportNode& node) {
+        mJson.text("name", node.tree.node->GetName());
+        mJson.text("kind", kindOf(*node.tree.node));
+        mJson.integer("parent", node.tree.parent);
+        constexpr std::array<const char*, 6> kOrders = {"XYZ", "XZY", "YXZ", "YZX", "ZXY", "ZYX"};
+        mJson.text("order", kOrders[static_cast<std::size_t>(node.transform->getTransformRotationOrder()) % 6]);
+        if (node.mesh >= 0)
+            mJson.integer("mesh", node.mesh);
+        mJson.key("channels");
+        mJson.beginObject();
+        for (int i = 0; i <= TnFbxTransform::kFbxTransformSkewZ; ++i) {
+            const auto type = static_cast<TnFbxTransform::EFbxTransformChannelType>(i);
+            channel(TnFbxTransform::getTransformChannelName(type), *node.transform->getTransformChannel(type));
+        }
+        if (node.camera)
+            channels(*node.camera);
+        if (node.light)
+            channels(*node.light);
+        mJson.endObject();
+        if (node.camera)
+            print(*node.camera, *node.tree.node);
+        if (node.light)
+            print(*node.light);
+        if (node.null) {
+            mJson.real("size", static_cast<double>(node.null->getNullSize()));
+            mJson.boolean("hasLook", node.null->getNullLookType() != TnFbxNull::kFbxNullLookNone);
+        }
+    }
+
+    void channels(TnFbxCamera& camera) {
+        // The names of the library are misspelt for good.
+        constexpr struct {
+            const char* name;
+            TnFbxCamera::EFbxCameraChannelType type;
+        } kChannels[] = {{"lookAtX", TnFbxCamera::kFbxCameraLookAtPositionX},
+                         {"lookAtY", TnFbxCamera::kFbxCameraLookAtPositionY},
+                         {"lookAtZ", TnFbxCamera::kFbxCameraLookAtPositionZ},
+                         {"roll", TnFbxCamera::kFbxCameraRoll},
+                         {"focalLength", TnFbxCamera::kFbxCameraFocalLength},
+                         {"apertureWidth", TnFbxCamera::kFbxCameraApertureWidth},
+                         {"apertureHeight", TnFbxCamera::kFbxCameraApertureHeight},
+                         {"nearPlane", TnFbxCamera::kFbxCameraNearPlane},
+                         {"farPlane", TnFbxCamera::kFbxCameraFarPlane},
+                         {"fieldOfViewX", TnFbxCamera::kFbxCameraFieldOfViewX},
+                         {"fieldOfViewY", TnFbxCamera::kFbxCameraFieldOfViewY},
+                         {"filmOffsetX", TnFbxCamera::kFbxCameraFilmOffsetX},
+                         {"filmOffsetY", TnFbxCamera::kFbxCameraFilmOffsetY}};
+        for (const auto& each : kChannels)
+            channel(each.name, *camera.getCameraChannel(each.type));
+    }
+
+    void channels(TnFbxLight& light) {
+        constexpr std::array<const char*, 6> kNames = {"red", "green", "blue", "alpha", "intensity", "coneAngle"};
+        for (std::size_t i = 0; i < kNames.size(); ++i)
+            channel(kNames[i], *light.getLightChannel(static_cast<TnFbxLight::EFbxLightChannelType>(i)));
+    }
+
+    /// A number, or where the array of the frames' numbers begins.
+    void channel(const char* name, const TnFbxChannel& channel) {
+        mJson.key(name);
+        if (!channel.getAnimated()) {
+            mJson.real(channel.getValue());
+            return;
+        }
+        const ReportFrames& frames = mScene.frames();
+        std::vector<float> samples(static_cast<std::size_t>(frames.count));
+        for (std::size_t i = 0; i < samples.size(); ++i)
+            samples[i] = channel.getAnimatedValue(static_cast<float>(frames.at(static_cast<int>(i))) /
+                                                  static_cast<float>(mScene.sampleStep()));
+        mJson.beginObject();
+        mJson.integer("at", static_cast<long long>(mArrays.add(samples)));
+        mJson.endObject();
+    }
+
+    /// What has no place in the value object: how film and picture come together.
+    void print(const TnFbxCamera& camera, const FbxNode& node) {
+        const auto* attribute = FbxCast<FbxCamera>(node.GetNodeAttribute());
+        mJson.key("camera");
+        mJson.beginObject();
+        mJson.boolean("orthographic", camera.getProjectionType() == TnFbxCamera::kFbxCameraOrthographic);
+        constexpr std::array<const char*, 4> kModes = {"both fields of view", "horizontal field of view",
+                                                       "vertical field of view", "focal length"};
+        mJson.text("drivenBy", kModes[static_cast<std::size_t>(camera.getApertureMode()) % kModes.size()]);
+        if (attribute) {
+            constexpr std::array<const char*, 6> kFits = {"none", "vertical", "horizontal",
+                                                          "fill", "overscan", "stretch"};
+            const auto fit = static_cast<std::size_t>(attribute->GateFit.Get());
+            mJson.text("gateFit", fit < kFits.size() ? kFits[fit] : kFits[0]);
+            mJson.real("pictureAspect", pictureAspect(*attribute));
+            mJson.real("squeeze", attribute->FilmSqueezeRatio.Get());
+            mJson.real("orthoWidth", kOrthoWidth * unit() * attribute->OrthoZoom.Get());
+            mJson.text("target", node.GetTarget() ? node.GetTarget()->GetName() : "");
+        }
+        mJson.endObject();
+    }
+
+    void print(const TnFbxLight& light) {
+        constexpr std::array<const char*, 3> kTypes = {"point", "directional", "spot"};
+        mJson.text("light", kTypes[static_cast<std::size_t>(light.getLightType()) % kTypes.size()]);
+    }
+
+    void print(const ReportShape& shape) {
+        mJson.integer("polygons", static_cast<long long>(shape.mesh.polygonCount));
+        mJson.integer("points", static_cast<long long>(shape.mesh.pointCount));
+        mJson.integer("triangles", static_cast<long long>(shape.mesh.triangleCount));
+        mJson.integer("drawnPoints", static_cast<long long>(shape.mesh.kept.size()));
+        mJson.integer("drawnTriangles", static_cast<long long>(shape.mesh.triangles.size()));
+        const bool isSmall = shape.mesh.kept.size() <= 1U << 16U;
+        mJson.integer("indexBytes", isSmall ? 2 : 4);
+        mJson.integer("indices", static_cast<long long>(isSmall ? indices<std::uint16_t>(shape.mesh)
+                                                                : indices<std::uint32_t>(shape.mesh)));
+        mJson.key("sets");
+        mJson.beginArray();
+        for (const std::vector<Point>& set : shape.sets)
+            mJson.integer(static_cast<long long>(mArrays.add(set)));
+        mJson.endArray();
+    }
+
+    template <class Index>
+    std::size_t indices(const ReportMesh& mesh) {
+        std::vector<std::array<Index, 3>> narrow;
+        narrow.reserve(mesh.triangles.size());
+        for (const auto& triangle : mesh.triangles)
+            narrow.push_back(
+                {static_cast<Index>(triangle[0]), static_cast<Index>(triangle[1]), static_cast<Index>(triangle[2])});
+        return mArrays.add(narrow);
+    }
+
+    /// Of the file, centimetres.
+    [[nodiscard]] double unit() const {
+        return mScene.opened().scene().GetGlobalSettings().GetSystemUnit().GetScaleFactor();
+    }
+
+    const ReportScene& mScene;
+    ReportArrays& mArrays;
+    JsonWriter& mJson;
+};
+
+} // namespace
+
+void printReport(const std::string& file, const ReportScene& scene, ReportArrays& arrays, JsonWriter& json) {
+    DocumentPrinter printer(scene, arrays, json);
+    json.beginObject();
+    json.text("format", "tarnell-fbx report 1");
+    json.text("file", spoken(file));
+    json.text("take", scene.take());
+    json.key("info");
+    json.beginObject();
+    printInfo(file, scene.opened(), json);
+    json.endObject();
+    printer.frames();
+    printer.nodes();
+    printer.shapes();
+    printer.sentences("notes", scene.notes());
+    printer.sentences("warnings", scene.warnings());
+    json.endObject();
+}
+
+} // namespace tool

@@ -1,0 +1,34 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The page of a report: what the build made of tools/report, with the data of files in its middle.
+#pragma once
+
+#include <ostream>
+#include <string>
+
+#include "JsonWriter.h"
+#include "ReportArrays.h"
+#include "ReportScene.h"
+
+namespace tool {
+
+/// The document of one file; its long arrays go to `arrays`, and the document says where.
+void printReport(const std::string& file, const ReportScene& scene, ReportArrays& arrays, JsonWriter& json);
+
+/// Writes a page: begin, then for each file its document and its arrays, then end.
+class ReportPage {
+public:
+    explicit ReportPage(std::ostream& out) : mOut(out) {}
+    void begin();
+    void addFile(const std::string& document, const ReportArrays& arrays);
+    void end();
+
+    /// What every page of ours begins with.
+    static std::string_view mark();
+
+private:
+    std::ostream& mOut;
+};
+
+} // namespace tool

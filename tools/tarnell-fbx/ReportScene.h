@@ -1,0 +1,118 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What a report shows of one file: faithful values of all its nodes, frame by frame, and as many numbers as a page can
+// carry.
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "ReportMesh.h"
+#include "SceneFile.h"
+#include "SceneQueries.h"
+
+#include "Fbx.h"
+#include "TnFbxCamera.h"
+#include "TnFbxLight.h"
+#include "TnFbxMesh.h"
+#include "TnFbxNull.h"
+#include "TnFbxReadInfo.h"
+
+namespace tool {
+
+/// The frames that a report has values of: first, first + step, … in whole frames of the file's rate.
+struct ReportFrames {
+    double rate = 24.0;
+    int first = 0;
+    int step = 1;
+    int count = 1;
+    [[nodiscard]] int at(int index) const { return first + index * step; }
+};
+
+/// One node and what it carries, if that is drawn.
+struct ReportNode {
+    TreeNode tree;
+    Tarnell::Fbx::TnFbxTransform* transform = nullptr; ///< of cameras and lights, their own: they look along -Z
+    Tarnell::Fbx::TnFbxCamera* camera = nullptr;
+    Tarnell::Fbx::TnFbxLight* light = nullptr;
+    Tarnell::Fbx::TnFbxNull* null = nullptr;
+    int mesh = -1; ///< index of the mesh
+};
+
+/// A mesh in the space of its node. Points that stand still have one set; others one for each of the shape frames.
+struct ReportShape {
+    ReportMesh mesh;
+    std::vector<std::vector<Point>> sets;
+};
+
+struct ReportWishes {
+    std::string take;                          ///< empty: the first one
+    std::optional<std::pair<int, int>> frames; ///< only these
+};
+
+class ReportScene {
+public:
+    /// Throws Unreadable.
+    ReportScene(const std::string& file, const ReportWishes& wishes);
+
+    [[nodiscard]] const SceneFile& opened() const { return mOpened; }
+    [[nodiscard]] const std::string& take() const { return mTake; }
+    [[nodiscard]] const ReportFrames& frames() const { return mFrames; }
+    /// Frames of the file's rate between two that channels have samples of.
+    [[nodiscard]] int sampleStep() const { return mSampleStep; }
+    [[nodiscard]] const std::vector<ReportNode>& nodes() const { return mNodes; }
+    [[nodiscard]] const std::vector<ReportShape>& shapes() const { return mShapes; }
+    /// The places among the frames at which points that move were read.
+    [[nodiscard]] const std::vector<int>& shapeFrames() const { return mShapeFrames; }
+    /// What the library noticed while it read.
+    [[nodiscard]] const std::vector<std::string>& warnings() const { return mWarnings; }
+    /// What the report leaves out, sentences for people.
+    [[nodiscard]] const std::vector<std::string>& notes() const { return mNotes; }
+
+private:
+    template <class Object>
+    struct Objects {
+        std::unique_ptr<Object[]> array;
+        int count = 0;
+        int next = 0;
+    };
+    template <class Object>
+    using Reader = bool (Tarnell::Fbx::Fbx::*)(Tarnell::Fbx::TnFbxReadInfo&, Object**, int&) const;
+
+    void chooseFrames(const ReportWishes& wishes);
+    void boundFrames(const ReportWishes& wishes);
+    template <class Object>
+    Objects<Object> read(Reader<Object> reader);
+    /// Options that sample every so-manyth frame, and read static values and meshes at a frame.
+    void readEvery(int step, int frame);
+    /// Options that read at one moment and, where that can be done exactly, sample next to nothing.
+    void readOneMoment(int frame);
+    template <class Object>
+    Object* next(Objects<Object>& objects, const FbxNode& node);
+    void linkNodes();
+    void readShapes();
+    void readMovingPoints(const std::vector<int>& wanted);
+    void thinShapes(const Objects<Tarnell::Fbx::TnFbxMesh>& meshes);
+    void note(const std::string& sentence) { mNotes.push_back(sentence); }
+
+    std::string mFile;
+    SceneFile mOpened;
+    std::string mTake;
+    Tarnell::Fbx::TnFbxReadInfo mInfo;
+    int mSampleStep = 1;
+    ReportFrames mFrames;
+    std::vector<ReportNode> mNodes;
+    Objects<Tarnell::Fbx::TnFbxTransform> mTransforms;
+    Objects<Tarnell::Fbx::TnFbxCamera> mCameras;
+    Objects<Tarnell::Fbx::TnFbxLight> mLights;
+    Objects<Tarnell::Fbx::TnFbxNull> mNulls;
+    std::vector<ReportShape> mShapes;
+    std::vector<int> mShapeFrames;
+    std::vector<std::string> mWarnings, mNotes;
+};
+
+} // namespace tool
