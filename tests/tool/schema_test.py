@@ -46,8 +46,8 @@ class Schemas(unittest.TestCase):
             self.assertEqual(list(faults(page, schema, schema)), [], page["file"])
             self.assertEqual(list(page)[:2], ["format", "file"])
 
-    def test_of_info_tree_and_records(self):
-        for command in ("info", "tree", "records"):
+    def test_of_info_tree_records_and_cameras(self):
+        for command in ("info", "tree", "records", "camera"):
             with self.subTest(command):
                 pages = documents(command, *FILES)
                 self.assertEqual([page["file"] for page in pages], FILES)
@@ -66,10 +66,15 @@ class Schemas(unittest.TestCase):
             self.check("props", pages[:1])
             self.check("curve", pages[1:])
 
+    def test_of_explained_cameras_at_frames(self):
+        pages = documents("camera", "--explain", "--frames", "1001:1003", SHOT)
+        self.assertEqual(len(pages[0]["cameras"][0]["frames"]), 3)
+        self.check("camera", pages)
+
     def test_of_a_file_that_cannot_be_read(self):
         with tempfile.TemporaryDirectory() as folder:
             missing = os.path.join(folder, "missing.fbx")
-            for command in ("info", "tree", "records", "cache"):
+            for command in ("info", "tree", "records", "cache", "camera"):
                 pages = documents(command, SHOT, missing)
                 self.check(command, pages)
                 self.assertEqual(list(pages[1]), ["format", "file", "error"])

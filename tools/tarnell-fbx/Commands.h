@@ -86,6 +86,13 @@ struct RecordsOptions : LookOptions {
     int values = 8;   ///< shown of a list; 0: all
 };
 
+struct CameraOptions : LookOptions {
+    std::string name; ///< empty: all
+    std::string take;
+    std::optional<std::pair<int, int>> frames; ///< every whole frame of the range
+    bool explain = false;
+};
+
 /// The names of the kinds that dump knows, in the order in which it prints them.
 const std::vector<std::string>& dumpKinds();
 
@@ -94,6 +101,7 @@ int convert(const ConvertOptions& options);
 int info(const LookOptions& options);
 int tree(const TreeOptions& options);
 int props(const PropsOptions& options);
+int camera(const CameraOptions& options);
 int curve(const CurveOptions& options);
 int cache(const CacheOptions& options);
 int records(const RecordsOptions& options);

@@ -104,6 +104,17 @@ void addProps(CLI::App& app, std::function<int()>& chosen) {
     addJson(*command, *options);
 }
 
+void addCamera(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<CameraOptions>(
+        app, chosen, "camera", "Show lens, film, picture and place of cameras, as the application shows them", camera);
+    addFiles(*command, *options, "FBX files, or patterns of names");
+    command->add_option("--name", options->name, "Only the cameras of that name")->type_name("NAME");
+    addFrames(*command, options->frames, "Every whole frame of A:B");
+    addTake(*command, options->take);
+    command->add_flag("--explain", options->explain, "Say where each number comes from");
+    addForm(*command, *options, "--csv", Form::csv, "Print comma-separated values, a line per camera and frame");
+}
+
 void addCurve(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] = addCommand<CurveOptions>(
         app, chosen, "curve", "Show the keys of an object's animated properties, and samples of them", curve);
@@ -160,6 +171,7 @@ void addLookCommands(CLI::App& app, std::function<int()>& chosen) {
     addFiles(*command, *options, "FBX files, or patterns of names");
     addTree(app, chosen);
     addProps(app, chosen);
+    addCamera(app, chosen);
     addCurve(app, chosen);
     addCache(app, chosen);
     addRecords(app, chosen);
