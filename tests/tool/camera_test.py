@@ -208,7 +208,9 @@ class Place(Close):
             self.assertEqual(camera["restDirection"], wanted)
 
     def test_units_become_centimetres(self):
-        camera = one(scene({"NearPlane": 0.1, "FarPlane": 50.0}, {"Lcl Translation": (1.0, 2.0, 3.0)}, unit=100.0))
+        camera = one(scene({"NearPlane": 0.1, "FarPlane": 50.0, "InterestPosition": (4.0, 2.0, 3.0)},
+                           {"Lcl Translation": (1.0, 2.0, 3.0)}, unit=100.0))
+        self.close(camera["at"]["interest"], [400, 200, 300])
         self.close(camera["at"]["position"], [100, 200, 300])
         self.close(camera["at"]["planes"], [10, 5000])
         self.close(camera["scale"], [1, 1, 1])

@@ -46,8 +46,8 @@ class Schemas(unittest.TestCase):
             self.assertEqual(list(faults(page, schema, schema)), [], page["file"])
             self.assertEqual(list(page)[:2], ["format", "file"])
 
-    def test_of_info_tree_records_and_cameras(self):
-        for command in ("info", "tree", "records", "camera"):
+    def test_of_commands_that_take_many_files(self):
+        for command in ("info", "tree", "records", "camera", "lint"):
             with self.subTest(command):
                 pages = documents(command, *FILES)
                 self.assertEqual([page["file"] for page in pages], FILES)
@@ -74,7 +74,7 @@ class Schemas(unittest.TestCase):
     def test_of_a_file_that_cannot_be_read(self):
         with tempfile.TemporaryDirectory() as folder:
             missing = os.path.join(folder, "missing.fbx")
-            for command in ("info", "tree", "records", "cache", "camera"):
+            for command in ("info", "tree", "records", "cache", "camera", "lint"):
                 pages = documents(command, SHOT, missing)
                 self.check(command, pages)
                 self.assertEqual(list(pages[1]), ["format", "file", "error"])

@@ -93,6 +93,11 @@ struct CameraOptions : LookOptions {
     bool explain = false;
 };
 
+struct LintOptions : LookOptions {
+    std::vector<std::string> rules; ///< ids; empty: all
+    bool list = false;              ///< of the rules, and no file
+};
+
 /// The names of the kinds that dump knows, in the order in which it prints them.
 const std::vector<std::string>& dumpKinds();
 
@@ -104,6 +109,7 @@ int props(const PropsOptions& options);
 int camera(const CameraOptions& options);
 int curve(const CurveOptions& options);
 int cache(const CacheOptions& options);
+int lint(const LintOptions& options);
 int records(const RecordsOptions& options);
 
 /// The text as it is shown to people: without anything that a terminal would obey.

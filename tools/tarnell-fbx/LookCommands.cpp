@@ -4,12 +4,15 @@
 // Options that several commands share, and those of each command that looks into files.
 #include "LookCommands.h"
 
+#include <algorithm>
 #include <charconv>
 #include <memory>
 #include <string_view>
 #include <system_error>
 
 #include "Commands.h"
+#include "LintRules.h"
+#include "Similarity.h"
 
 namespace tool {
 namespace {
@@ -140,6 +143,37 @@ void addCache(CLI::App& app, std::function<int()>& chosen) {
     command->add_flag("--samples", options->samples, "Every sample with its place");
 }
 
+std::string unknownRule(const std::string& id) {
+    std::vector<std::string> ids;
+    for (const LintRule& rule : lintRules())
+        ids.emplace_back(rule.id);
+    if (std::find(ids.begin(), ids.end(), id) != ids.end())
+        return {};
+    std::string answer = "there is no rule " + id;
+    for (const std::string& similar : mostSimilar(id, ids))
+        answer += "; did you mean " + similar + '?';
+    return answer;
+}
+
+void addLint(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<LintOptions>(
+        app, chosen, "lint", "Say what tends to go wrong with a file between programs, and what to do", lint);
+    addFiles(*command, *options, "FBX files, or patterns of names");
+    command->get_option("FILE")->required(false);
+    command->add_option("--rules", options->rules, "Only the rules with these ids, with commas between")
+        ->delimiter(',')
+        ->type_name("LIST")
+        ->allow_extra_args(false)
+        ->check(unknownRule);
+    command->add_flag("--list", options->list, "List the rules");
+    command->footer("Exit status: 0 nothing, or notes alone; 1 errors or warnings were found, or a file could not be "
+                    "read; 2 wrong usage.\n");
+    command->parse_complete_callback([files = &options->files, list = &options->list] {
+        if (files->empty() && !*list)
+            throw CLI::RequiredError("FILE");
+    });
+}
+
 void addRecords(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] = addCommand<RecordsOptions>(
         app, chosen, "records", "Show the records that a file is made of, with the place of each", records);
@@ -174,6 +208,7 @@ void addLookCommands(CLI::App& app, std::function<int()>& chosen) {
     addCamera(app, chosen);
     addCurve(app, chosen);
     addCache(app, chosen);
+    addLint(app, chosen);
     addRecords(app, chosen);
 }
 
