@@ -66,6 +66,16 @@ class Schemas(unittest.TestCase):
             self.check("props", pages[:1])
             self.check("curve", pages[1:])
 
+    def test_of_differences(self):
+        data = os.path.join(ROOT, "tests", "data")
+        schema = load("diff")
+        clean = os.path.join(data, "lint", "clean.fbx")
+        for other in FILES:
+            page = documents("diff", clean, other)[0]
+            self.assertEqual(list(faults(page, schema, schema)), [], other)
+            self.assertEqual(list(page)[:3], ["format", "a", "b"])
+        self.assertEqual(list(documents("diff", clean, "missing.fbx")[0]), ["format", "a", "b", "error"])
+
     def test_of_explained_cameras_at_frames(self):
         pages = documents("camera", "--explain", "--frames", "1001:1003", SHOT)
         self.assertEqual(len(pages[0]["cameras"][0]["frames"]), 3)

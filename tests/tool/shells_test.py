@@ -12,7 +12,7 @@ import unittest
 
 from support import run
 
-COMMANDS = ("info", "tree", "props", "curve", "cache", "camera", "lint", "records", "dump", "convert", "completion")
+COMMANDS = ("info", "tree", "props", "curve", "cache", "camera", "diff", "lint", "records", "dump", "convert", "completion")
 
 
 def options_of(command):

@@ -50,7 +50,7 @@ struct ConvertOptions {
     bool strict = false; ///< what does not come over makes the status kLosses
 };
 
-enum class Form { text, json, jsonLines, csv, plot };
+enum class Form { text, json, jsonLines, csv, plot, html };
 
 /// What the commands that look into files have in common.
 struct LookOptions {
@@ -98,6 +98,14 @@ struct LintOptions : LookOptions {
     bool list = false;              ///< of the rules, and no file
 };
 
+/// Two files instead of any number.
+struct DiffOptions : LookOptions {
+    std::string a, b;
+    std::string take;
+    double tolerance = 1e-4;                   ///< relative to the larger of 1 and the numbers
+    std::optional<std::pair<int, int>> frames; ///< at which the points of meshes are compared
+};
+
 /// The names of the kinds that dump knows, in the order in which it prints them.
 const std::vector<std::string>& dumpKinds();
 
@@ -109,6 +117,7 @@ int props(const PropsOptions& options);
 int camera(const CameraOptions& options);
 int curve(const CurveOptions& options);
 int cache(const CacheOptions& options);
+int diff(const DiffOptions& options);
 int lint(const LintOptions& options);
 int records(const RecordsOptions& options);
 

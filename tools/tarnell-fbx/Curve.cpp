@@ -442,6 +442,7 @@ int curve(const CurveOptions& options) {
             plot(curves, page);
             break;
         case Form::text:
+        case Form::html: // not offered here
             printText(curves, page);
             break;
         }

@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <charconv>
+#include <cmath>
 #include <memory>
 #include <string_view>
 #include <system_error>
@@ -143,6 +144,45 @@ void addCache(CLI::App& app, std::function<int()>& chosen) {
     command->add_flag("--samples", options->samples, "Every sample with its place");
 }
 
+/// A number from 0 on; the command line's own conversion would take infinities and NaN.
+std::string parseTolerance(const std::string& text, double& tolerance) {
+    double number = -1.0;
+    const char* const end = text.data() + text.size();
+    const auto [rest, error] = std::from_chars(text.data(), end, number);
+    if (rest != end || error != std::errc() || !std::isfinite(number) || number < 0.0)
+        return "not a number from 0 on: " + text;
+    tolerance = number;
+    return {};
+}
+
+void addDiff(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<DiffOptions>(app, chosen, "diff", "Say what two files show differently", diff);
+    command->add_option("A", options->a, "The first FBX file")->required()->type_name("");
+    command->add_option("B", options->b, "The second one; one of the two may be - for standard input")
+        ->required()
+        ->type_name("");
+    command
+        ->add_option_function<std::string>(
+            "--tolerance",
+            [&tolerance = options->tolerance](const std::string& text) {
+                const std::string complaint = parseTolerance(text, tolerance);
+                if (!complaint.empty())
+                    throw CLI::ValidationError("--tolerance", complaint);
+            },
+            "How far numbers may be apart, relative to the larger of 1 and them (0.0001)")
+        ->type_name("T");
+    addFrames(*command, options->frames, "Mesh points at every whole frame of A:B instead of at the first one");
+    addTake(*command, options->take);
+    addJson(*command, *options);
+    addForm(*command, *options, "--html", Form::html, "Print a page for a browser");
+    command->parse_complete_callback([a = &options->a, b = &options->b] {
+        if (*a == "-" && *b == "-")
+            throw CLI::ValidationError("B", "only one of the two files can be standard input");
+    });
+    command->footer("Exit status: 0 the files show the same; 1 they do not, or one of them could not be read; 2 wrong "
+                    "usage.\n");
+}
+
 std::string unknownRule(const std::string& id) {
     std::vector<std::string> ids;
     for (const LintRule& rule : lintRules())
@@ -208,6 +248,7 @@ void addLookCommands(CLI::App& app, std::function<int()>& chosen) {
     addCamera(app, chosen);
     addCurve(app, chosen);
     addCache(app, chosen);
+    addDiff(app, chosen);
     addLint(app, chosen);
     addRecords(app, chosen);
 }

@@ -200,4 +200,5 @@ def main():
             stream.write(write())
 
 
-main()
+if __name__ == "__main__":
+    main()
