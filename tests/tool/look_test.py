@@ -118,7 +118,8 @@ class Jobs(Folder):
 class Output(Folder):
     def test_that_cannot_be_written_is_an_error_of_every_command(self):
         for arguments in (("info", SHOT), ("tree", SHOT), ("props", SHOT, "crate"), ("curve", SHOT, "shotCam"),
-                          ("cache", SHOT), ("records", SHOT), ("records", "--json", SHOT), ("dump", SHOT),
+                          ("camera", SHOT), ("camera", "--csv", SHOT), ("diff", SHOT, SHOT), ("lint", SHOT), ("lint", "--list"), ("cache", SHOT), ("records", SHOT),
+                          ("records", "--json", SHOT), ("dump", SHOT),
                           ("info", "--jobs", "2", SHOT, SHOT), ("--help",), ("--version",), ("help", "tree"),
                           ("completion", "bash"), ("manual",)):
             with open("/dev/full", "w", encoding="utf-8") as full:
@@ -196,7 +197,8 @@ class Usage(unittest.TestCase):
             version = re.search(r"project\(TarnellFbx VERSION (\S+)", stream.read()).group(1)
         self.assertEqual(run("--version").stdout, f"tarnell-fbx {version}\n")
         self.assertEqual(run("help").stdout, run("--help").stdout)
-        for command in ("info", "tree", "props", "curve", "cache", "records", "dump", "convert", "completion"):
+        for command in ("info", "tree", "props", "camera", "curve", "cache", "diff", "lint", "records", "dump", "convert",
+                        "completion"):
             self.assertIn(command, run("help").stdout)
             self.assertEqual(run("help", command).stdout, run(command, "--help").stdout)
             self.assertIn("Exit status", run("help", command).stdout)

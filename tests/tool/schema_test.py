@@ -46,8 +46,8 @@ class Schemas(unittest.TestCase):
             self.assertEqual(list(faults(page, schema, schema)), [], page["file"])
             self.assertEqual(list(page)[:2], ["format", "file"])
 
-    def test_of_info_tree_and_records(self):
-        for command in ("info", "tree", "records"):
+    def test_of_commands_that_take_many_files(self):
+        for command in ("info", "tree", "records", "camera", "lint"):
             with self.subTest(command):
                 pages = documents(command, *FILES)
                 self.assertEqual([page["file"] for page in pages], FILES)
@@ -66,10 +66,25 @@ class Schemas(unittest.TestCase):
             self.check("props", pages[:1])
             self.check("curve", pages[1:])
 
+    def test_of_differences(self):
+        data = os.path.join(ROOT, "tests", "data")
+        schema = load("diff")
+        clean = os.path.join(data, "lint", "clean.fbx")
+        for other in FILES:
+            page = documents("diff", clean, other)[0]
+            self.assertEqual(list(faults(page, schema, schema)), [], other)
+            self.assertEqual(list(page)[:3], ["format", "a", "b"])
+        self.assertEqual(list(documents("diff", clean, "missing.fbx")[0]), ["format", "a", "b", "error"])
+
+    def test_of_explained_cameras_at_frames(self):
+        pages = documents("camera", "--explain", "--frames", "1001:1003", SHOT)
+        self.assertEqual(len(pages[0]["cameras"][0]["frames"]), 3)
+        self.check("camera", pages)
+
     def test_of_a_file_that_cannot_be_read(self):
         with tempfile.TemporaryDirectory() as folder:
             missing = os.path.join(folder, "missing.fbx")
-            for command in ("info", "tree", "records", "cache"):
+            for command in ("info", "tree", "records", "cache", "camera", "lint"):
                 pages = documents(command, SHOT, missing)
                 self.check(command, pages)
                 self.assertEqual(list(pages[1]), ["format", "file", "error"])

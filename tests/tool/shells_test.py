@@ -12,7 +12,7 @@ import unittest
 
 from support import run
 
-COMMANDS = ("info", "tree", "props", "curve", "cache", "records", "dump", "convert", "completion")
+COMMANDS = ("info", "tree", "props", "curve", "cache", "camera", "diff", "lint", "records", "dump", "convert", "completion")
 
 
 def options_of(command):
@@ -38,7 +38,7 @@ def bash(line):
 class Completions(unittest.TestCase):
     def test_bash_offers_commands_options_and_files(self):
         self.assertEqual(bash([""]), sorted([*COMMANDS, "help", "--help", "--version"]))
-        self.assertEqual(bash(["c"]), ["cache", "completion", "convert", "curve"])
+        self.assertEqual(bash(["c"]), ["cache", "camera", "completion", "convert", "curve"])
         self.assertEqual(bash(["help", "tr"]), ["tree"])
         for command in COMMANDS:
             self.assertEqual([each for each in bash([command, "--"])], options_of(command))

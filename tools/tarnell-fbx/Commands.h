@@ -50,7 +50,7 @@ struct ConvertOptions {
     bool strict = false; ///< what does not come over makes the status kLosses
 };
 
-enum class Form { text, json, jsonLines, csv, plot };
+enum class Form { text, json, jsonLines, csv, plot, html };
 
 /// What the commands that look into files have in common.
 struct LookOptions {
@@ -86,6 +86,26 @@ struct RecordsOptions : LookOptions {
     int values = 8;   ///< shown of a list; 0: all
 };
 
+struct CameraOptions : LookOptions {
+    std::string name; ///< empty: all
+    std::string take;
+    std::optional<std::pair<int, int>> frames; ///< every whole frame of the range
+    bool explain = false;
+};
+
+struct LintOptions : LookOptions {
+    std::vector<std::string> rules; ///< ids; empty: all
+    bool list = false;              ///< of the rules, and no file
+};
+
+/// Two files instead of any number.
+struct DiffOptions : LookOptions {
+    std::string a, b;
+    std::string take;
+    double tolerance = 1e-4;                   ///< relative to the larger of 1 and the numbers
+    std::optional<std::pair<int, int>> frames; ///< at which the points of meshes are compared
+};
+
 /// The names of the kinds that dump knows, in the order in which it prints them.
 const std::vector<std::string>& dumpKinds();
 
@@ -94,8 +114,11 @@ int convert(const ConvertOptions& options);
 int info(const LookOptions& options);
 int tree(const TreeOptions& options);
 int props(const PropsOptions& options);
+int camera(const CameraOptions& options);
 int curve(const CurveOptions& options);
 int cache(const CacheOptions& options);
+int diff(const DiffOptions& options);
+int lint(const LintOptions& options);
 int records(const RecordsOptions& options);
 
 struct ReportOptions {

@@ -10,6 +10,7 @@
 #include <fbxsdk.h>
 
 #include "Commands.h"
+#include "Csv.h"
 #include "CurveKeysText.h"
 #include "Curves.h"
 #include "Plot.h"
@@ -310,15 +311,6 @@ void plot(const Curves& curves, Page& page) {
 
 // ---- For programs ----
 
-std::string csvField(const std::string& text) {
-    if (text.find_first_of(",\"\r\n") == std::string::npos)
-        return text;
-    std::string field = "\"";
-    for (const char character : text)
-        field += character == '"' ? std::string("\"\"") : std::string(1, character);
-    return field + '"';
-}
-
 void printCsv(const Curves& curves, Page& page) {
     std::ostream& out = page.begin();
     out << "frame,seconds";
@@ -450,6 +442,7 @@ int curve(const CurveOptions& options) {
             plot(curves, page);
             break;
         case Form::text:
+        case Form::html: // not offered here
             printText(curves, page);
             break;
         }

@@ -4,12 +4,16 @@
 // Options that several commands share, and those of each command that looks into files.
 #include "LookCommands.h"
 
+#include <algorithm>
 #include <charconv>
+#include <cmath>
 #include <memory>
 #include <string_view>
 #include <system_error>
 
 #include "Commands.h"
+#include "LintRules.h"
+#include "Similarity.h"
 
 namespace tool {
 namespace {
@@ -104,6 +108,17 @@ void addProps(CLI::App& app, std::function<int()>& chosen) {
     addJson(*command, *options);
 }
 
+void addCamera(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<CameraOptions>(
+        app, chosen, "camera", "Show lens, film, picture and place of cameras, as the application shows them", camera);
+    addFiles(*command, *options, "FBX files, or patterns of names");
+    command->add_option("--name", options->name, "Only the cameras of that name")->type_name("NAME");
+    addFrames(*command, options->frames, "Every whole frame of A:B");
+    addTake(*command, options->take);
+    command->add_flag("--explain", options->explain, "Say where each number comes from");
+    addForm(*command, *options, "--csv", Form::csv, "Print comma-separated values, a line per camera and frame");
+}
+
 void addCurve(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] = addCommand<CurveOptions>(
         app, chosen, "curve", "Show the keys of an object's animated properties, and samples of them", curve);
@@ -127,6 +142,76 @@ void addCache(CLI::App& app, std::function<int()>& chosen) {
     addFiles(*command, *options, "FBX, .xml, .mc, .mcx and .pc2 files, or patterns of names");
     command->add_flag("--verify", options->verify, "Read every number; a fault makes the exit status 1");
     command->add_flag("--samples", options->samples, "Every sample with its place");
+}
+
+/// A number from 0 on; the command line's own conversion would take infinities and NaN.
+std::string parseTolerance(const std::string& text, double& tolerance) {
+    double number = -1.0;
+    const char* const end = text.data() + text.size();
+    const auto [rest, error] = std::from_chars(text.data(), end, number);
+    if (rest != end || error != std::errc() || !std::isfinite(number) || number < 0.0)
+        return "not a number from 0 on: " + text;
+    tolerance = number;
+    return {};
+}
+
+void addDiff(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<DiffOptions>(app, chosen, "diff", "Say what two files show differently", diff);
+    command->add_option("A", options->a, "The first FBX file")->required()->type_name("");
+    command->add_option("B", options->b, "The second one; one of the two may be - for standard input")
+        ->required()
+        ->type_name("");
+    command
+        ->add_option_function<std::string>(
+            "--tolerance",
+            [&tolerance = options->tolerance](const std::string& text) {
+                const std::string complaint = parseTolerance(text, tolerance);
+                if (!complaint.empty())
+                    throw CLI::ValidationError("--tolerance", complaint);
+            },
+            "How far numbers may be apart, relative to the larger of 1 and them (0.0001)")
+        ->type_name("T");
+    addFrames(*command, options->frames, "Mesh points at every whole frame of A:B instead of at the first one");
+    addTake(*command, options->take);
+    addJson(*command, *options);
+    addForm(*command, *options, "--html", Form::html, "Print a page for a browser");
+    command->parse_complete_callback([a = &options->a, b = &options->b] {
+        if (*a == "-" && *b == "-")
+            throw CLI::ValidationError("B", "only one of the two files can be standard input");
+    });
+    command->footer("Exit status: 0 the files show the same; 1 they do not, or one of them could not be read; 2 wrong "
+                    "usage.\n");
+}
+
+std::string unknownRule(const std::string& id) {
+    std::vector<std::string> ids;
+    for (const LintRule& rule : lintRules())
+        ids.emplace_back(rule.id);
+    if (std::find(ids.begin(), ids.end(), id) != ids.end())
+        return {};
+    std::string answer = "there is no rule " + id;
+    for (const std::string& similar : mostSimilar(id, ids))
+        answer += "; did you mean " + similar + '?';
+    return answer;
+}
+
+void addLint(CLI::App& app, std::function<int()>& chosen) {
+    auto [command, options] = addCommand<LintOptions>(
+        app, chosen, "lint", "Say what tends to go wrong with a file between programs, and what to do", lint);
+    addFiles(*command, *options, "FBX files, or patterns of names");
+    command->get_option("FILE")->required(false);
+    command->add_option("--rules", options->rules, "Only the rules with these ids, with commas between")
+        ->delimiter(',')
+        ->type_name("LIST")
+        ->allow_extra_args(false)
+        ->check(unknownRule);
+    command->add_flag("--list", options->list, "List the rules");
+    command->footer("Exit status: 0 nothing, or notes alone; 1 errors or warnings were found, or a file could not be "
+                    "read; 2 wrong usage.\n");
+    command->parse_complete_callback([files = &options->files, list = &options->list] {
+        if (files->empty() && !*list)
+            throw CLI::RequiredError("FILE");
+    });
 }
 
 void addRecords(CLI::App& app, std::function<int()>& chosen) {
@@ -176,8 +261,11 @@ void addLookCommands(CLI::App& app, std::function<int()>& chosen) {
     addFiles(*command, *options, "FBX files, or patterns of names");
     addTree(app, chosen);
     addProps(app, chosen);
+    addCamera(app, chosen);
     addCurve(app, chosen);
     addCache(app, chosen);
+    addDiff(app, chosen);
+    addLint(app, chosen);
     addRecords(app, chosen);
     addReport(app, chosen);
 }

@@ -128,8 +128,8 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
 }
 
 constexpr const char* kStatuses =
-    "Exit status: 0 all is well; 1 something could not be read or written; 2 wrong usage; "
-    "3 done, but with --strict: not everything came over.\n";
+    "Exit status: 0 all is well; 1 something could not be read or written, or lint, diff or the check of a cache found "
+    "something; 2 wrong usage; 3 done, but with --strict: not everything came over.\n";
 
 /// What the first word is, when it is no option; a command that there is not gets an answer of its own.
 std::string unknownCommand(const CLI::App& app, const std::string& word) {

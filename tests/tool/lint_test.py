@@ -1,0 +1,146 @@
+# SPDX-License-Identifier: MIT
+# Copyright (c) Tarnell FBX contributors
+#
+# Every rule of lint has a file of tests/data/lint that is about it and trips it, and clean.fbx, which trips none; every
+# rule stands in docs/lint.md with the same words.
+import glob
+import json
+import os
+import re
+import subprocess
+import tempfile
+import unittest
+
+from support import ROOT, SDK_DATA, SHOT, run
+
+DATA = os.path.join(ROOT, "tests", "data", "lint")
+# All of the files are texts.
+OF_A_TEXT = {"ascii-encoding"}
+# What cannot be had alone.
+ALONG = {"not-readable": {"span-differs-from-keys"},  # a span that long
+         "repaired": {"rate-unstated"},  # a custom rate that is worked out
+         "several-takes": {"take-without-keys"}}
+# Files with other names: the clean one is a text, and for the rule of texts the other way round.
+TRIPS = {"ascii-encoding": os.path.join(DATA, "clean.fbx")}
+
+
+def rules():
+    return json.loads(run("lint", "--list", "--json").stdout)
+
+
+def lint(file, *arguments):
+    result = run("lint", "--json", *arguments, file)
+    page = json.loads(result.stdout)
+    assert "error" not in page, page
+    return page, result.returncode
+
+
+def found(page):
+    return {each["rule"] for each in page["findings"]}
+
+
+class Rules(unittest.TestCase):
+    def test_are_many_and_have_ids_of_their_own(self):
+        ids = [rule["rule"] for rule in rules()]
+        self.assertGreaterEqual(len(ids), 25)
+        self.assertEqual(len(set(ids)), len(ids))
+        for rule in rules():
+            self.assertRegex(rule["rule"], "^[a-z]+(-[a-z]+)*$")
+            self.assertIn(rule["severity"], ("note", "warning", "error"))
+            self.assertTrue(rule["reason"].endswith("."), rule)
+            self.assertTrue(rule["remedy"].endswith("."), rule)
+
+    def test_each_has_a_file_that_trips_it_and_nothing_else(self):
+        for rule in rules():
+            name = rule["rule"]
+            with self.subTest(name):
+                page, status = lint(TRIPS.get(name, os.path.join(DATA, name + ".fbx")))
+                self.assertEqual(found(page), {name} | ALONG.get(name, set()) | OF_A_TEXT)
+                severities = {each["severity"] for each in page["findings"]}
+                self.assertEqual(status, 0 if severities == {"note"} else 1)
+
+    def test_each_has_a_file_that_does_not_trip_it(self):
+        page, status = lint(os.path.join(DATA, "clean.fbx"))
+        self.assertEqual((found(page), status), (OF_A_TEXT, 0))
+        self.assertNotIn("ascii-encoding", found(lint(SHOT)[0]))
+
+    def test_every_file_belongs_to_a_rule(self):
+        names = {os.path.basename(file)[:-4] for file in glob.glob(os.path.join(DATA, "*.fbx"))}
+        self.assertEqual(names, {rule["rule"] for rule in rules()} - set(TRIPS) | {"clean"})
+
+    def test_files_are_as_their_script_writes_them(self):
+        with tempfile.TemporaryDirectory() as folder:
+            script = os.path.join(folder, "make_lint_files.py")
+            with open(os.path.join(DATA, "make_lint_files.py"), encoding="utf-8") as stream:
+                text = stream.read()
+            with open(script, "w", encoding="utf-8") as stream:
+                stream.write(text)
+            subprocess.run(["python3", "-B", script], check=True)
+            for file in glob.glob(os.path.join(DATA, "*.fbx")):
+                with open(file, "rb") as ours, open(os.path.join(folder, os.path.basename(file)), "rb") as theirs:
+                    self.assertEqual(ours.read(), theirs.read(), file)
+
+    def test_stand_in_the_documentation_with_the_same_words(self):
+        with open(os.path.join(ROOT, "docs", "lint.md"), encoding="utf-8") as stream:
+            text = stream.read()
+        sections = re.split("^### ", text, flags=re.M)[1:]
+        self.assertEqual([each.split("\n", 1)[0] for each in sections], [rule["rule"] for rule in rules()])
+        for rule, section in zip(rules(), sections):
+            words = " ".join(section.split())
+            for part in (rule["severity"], rule["reason"], rule["remedy"]):
+                self.assertIn(part, words, rule["rule"])
+            file = re.search(r"\(\.\./(tests/data/[^)]+)\)", section).group(1)
+            self.assertTrue(os.path.exists(os.path.join(ROOT, file)), file)
+
+
+class Findings(unittest.TestCase):
+    def test_name_the_object_and_the_numbers(self):
+        for name, who, words in (("keys-between-frames", "cam", "1 of 5 keys between whole frames, the first at 2.25"),
+                                 ("span-differs-from-keys", "shot", "frames 0 to 10, its keys are at 0 to 4"),
+                                 ("rotation-flips", "cam", "from 180° to −175° between frames 2 and 3"),
+                                 ("film-shape-differs", "cam", "the film is 1.7778:1, the picture 0.9259:1"),
+                                 ("far-from-origin", "tri", "2e+05 cm from the origin, where floats are 0.0156 cm apart"),
+                                 ("lens-values-disagree", "cam", "FieldOfViewX is 90°"),
+                                 ("polygons-out-of-range", "tri", "1 corner names a point beyond the 3 that there are"),
+                                 ("cache-unusable", "tri", "4"), ("cache-range", "tri", "from frame 0 to 2"),
+                                 ("cache-rate", "tri", "24 frames per second, and the file has 25"),
+                                 ("duplicate-names", "twin", "2 nodes"), ("constraints", None, '"Aim"')):
+            page, _ = lint(os.path.join(DATA, name + ".fbx"), "--rules", name)
+            self.assertEqual([each["object"] for each in page["findings"]], [who], name)
+            self.assertIn(words, page["findings"][0]["text"])
+
+    def test_of_chosen_rules_only(self):
+        file = os.path.join(DATA, "repaired.fbx")
+        self.assertEqual(found(lint(file, "--rules", "repaired")[0]), {"repaired"})
+        self.assertEqual(found(lint(file, "--rules", "repaired,rate-unstated")[0]), {"repaired", "rate-unstated"})
+        self.assertEqual(lint(file, "--rules", "clip-planes")[1], 0)
+        result = run("lint", "--rules", "repaird", file)
+        self.assertEqual((result.returncode, result.stdout), (2, ""))
+        self.assertIn("did you mean repaired", result.stderr)
+
+    def test_of_several_files_decide_the_status(self):
+        clean, other = os.path.join(DATA, "clean.fbx"), os.path.join(DATA, "clip-planes.fbx")
+        self.assertEqual(run("lint", clean, clean).returncode, 0)
+        self.assertEqual(run("lint", clean, other, clean).returncode, 1)
+
+    def test_that_are_many_are_counted_for_people_and_listed_for_programs(self):
+        with open(os.path.join(SDK_DATA, "nulls_7400_ascii.fbx"), encoding="utf-8") as stream:
+            text = stream.read()
+        more = "".join('\tModel: %d, "Model::pair%d", "Null" {\n\t\tVersion: 232\n\t}\n' % (100 + i, i // 2)
+                       for i in range(60))
+        text = text.replace("Objects:  {\n", "Objects:  {\n" + more, 1)
+        result = run("lint", "--json", "--rules", "duplicate-names", "-", input=text)
+        self.assertEqual(len(json.loads(result.stdout)["findings"]), 30)
+        self.assertIn("… and 10 more; --json has all", run("lint", "--rules", "duplicate-names", "-", input=text).stdout)
+
+    def test_of_files_that_cannot_be_read_are_errors(self):
+        result = run("lint", "--json", os.path.join(DATA, "missing.fbx"))
+        self.assertEqual((result.returncode, list(json.loads(result.stdout))), (1, ["format", "file", "error"]))
+
+    def test_without_a_file_are_wrong_usage(self):
+        result = run("lint")
+        self.assertEqual((result.returncode, result.stdout), (2, ""))
+        self.assertIn("FILE", result.stderr)
+
+
+unittest.main(argv=[__file__], verbosity=0)

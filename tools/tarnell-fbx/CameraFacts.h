@@ -1,0 +1,122 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What a file says of its cameras, as data: commands print it. Numbers come from a faithful read of the library, in
+// centimetres and with Y up; where they come from is told by the file's own properties.
+#pragma once
+
+#include <array>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "Optics.h"
+#include "SceneFile.h"
+#include "TakeFacts.h"
+
+namespace Tarnell::Fbx {
+class TnFbxCamera;
+}
+
+namespace tool {
+
+using Vector3 = std::array<double, 3>;
+
+/// A camera at one frame.
+struct CameraMoment {
+    double frame = 0.0, seconds = 0.0;
+    double focalLength = 0.0;                    ///< millimetres
+    FilmSize film;                               ///< inches, the width with the squeeze in it
+    double fovX = 0.0, fovY = 0.0;               ///< of the film, degrees
+    FilmSize picture;                            ///< what the picture shows of the film plane, inches
+    double pictureFovX = 0.0, pictureFovY = 0.0; ///< degrees
+    double offsetX = 0.0, offsetY = 0.0;         ///< of the film, inches
+    double nearPlane = 0.0, farPlane = 0.0;      ///< centimetres
+    double roll = 0.0;                           ///< degrees
+    Vector3 position{};                          ///< in the world, centimetres, Y up
+    Vector3 direction{}, up{};                   ///< in the world, unit length
+    Vector3 interest{};                          ///< the target's place, or the point of interest
+};
+
+/// A number that keys drive.
+struct CameraChannel {
+    std::string object, property; ///< "camera1", "Lcl Translation.X"
+    bool inForce = true;          ///< whether what is seen depends on it
+    int keys = 0;
+    double firstFrame = 0.0, lastFrame = 0.0; ///< of its keys
+    double low = 0.0, high = 0.0;             ///< of its keys
+};
+
+/// Something that the file says and that has no say.
+struct IdleValue {
+    std::string property, value, reason;
+    std::string shortValue; ///< rounded, for people
+};
+
+/// Where a number comes from, a sentence each.
+struct Origin {
+    std::string what, text;
+};
+
+enum class LensDriver { focalLength, horizontalAngle, verticalAngle, twoAngles };
+
+struct OrthoFacts {
+    double zoom = 1.0;       ///< as the file has it
+    double width = 0.0;      ///< of what is seen, centimetres
+    bool isBlenders = false; ///< the zoom is the width itself, in the camera's own scale
+};
+
+/// A camera, whatever the frame.
+class CameraFacts {
+public:
+    std::string name;
+    FbxNode* node = nullptr; ///< of the opened file
+    bool orthographic = false, stereo = false;
+    LensDriver driver = LensDriver::focalLength;
+    bool moves = false;       ///< its place or direction in the world changes
+    bool lensChanges = false; ///< focal length, film or offset change
+    std::string gate;         ///< name of the film back; empty when it has none
+    double squeeze = 1.0;
+    std::optional<OrthoFacts> ortho;
+    std::array<double, 2> resolution{}; ///< as the file has it; zeros when it has none
+    double pixelAspect = 1.0;
+    int aspectMode = 0;
+    double pictureAspect = 0.0; ///< 0 where the file has no resolution: the picture is the film
+    GateFit gateFit = GateFit::none;
+    Vector3 scale{1.0, 1.0, 1.0}; ///< of the camera in the file's world
+    std::string target;           ///< name of the node that it looks at
+    bool hasTarget = false;
+    Vector3 preRotation{}, postRotation{}; ///< degrees
+    bool rotationActive = false;           ///< whether those are in force
+    std::string restDirection;             ///< where rotation 0 looks in the parent's space: "−Z"
+    std::vector<std::string> movingParents;
+    std::vector<CameraChannel> channels;
+    std::vector<IdleValue> idle;
+    std::vector<Origin> origins;
+
+    /// Everything that may change. Frames outside of the take are as its ends.
+    [[nodiscard]] CameraMoment at(double frame) const;
+
+private:
+    friend class CameraGathering;
+    std::shared_ptr<const Tarnell::Fbx::TnFbxCamera> mValues;
+    double mFrameRate = 24.0;
+    double mUnit = 1.0; ///< of the file, centimetres
+};
+
+struct CameraList {
+    TakeFacts take;
+    double unit = 1.0; ///< of the file, centimetres
+    std::string axes;  ///< of the file
+    std::vector<CameraFacts> cameras;
+    std::vector<std::string> warnings; ///< what the library noticed
+};
+
+/// The file's cameras, parents before their children; those of the application's views are none. Reads the file once
+/// more, through the library. Throws Unreadable.
+CameraList camerasOf(const std::string& file, const SceneFile& opened, const std::string& takeName);
+
+const char* driverText(LensDriver driver);
+
+} // namespace tool

@@ -1,0 +1,72 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What the comparisons see of two files, and the comparisons themselves.
+#pragma once
+
+#include <functional>
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+#include "CameraFacts.h"
+#include "DiffFacts.h"
+#include "FaithfulRead.h"
+#include "NodeMatching.h"
+#include "TnFbxLight.h"
+#include "TnFbxMesh.h"
+#include "TnFbxTransform.h"
+
+namespace tool {
+
+/// One of the two files.
+struct DiffSide {
+    DiffSide(const DiffFile& file, const std::string& takeName);
+
+    const DiffFile& file;
+    std::string takeName;
+    FbxAnimStack* stack;
+    TakeFacts take;
+    double unit; ///< centimetres
+    CameraList cameras;
+    FaithfulObjects<Tarnell::Fbx::TnFbxTransform> transforms;
+    FaithfulObjects<Tarnell::Fbx::TnFbxLight> lights;
+    std::unordered_map<const FbxNode*, const Tarnell::Fbx::TnFbxTransform*> transformOf;
+    std::unordered_map<const FbxNode*, Tarnell::Fbx::TnFbxLight*> lightOf;
+    std::unordered_map<const FbxNode*, const CameraFacts*> cameraOf;
+};
+
+/// A moment that both files have, as a frame of each.
+struct DiffMoment {
+    double a, b;
+};
+
+/// Both files, and what was found so far.
+class Comparison {
+public:
+    Comparison(const DiffFile& a, const DiffFile& b, const DiffSettings& settings);
+
+    const DiffSide a, b;
+    const DiffSettings& settings;
+    std::vector<NodePair> pairs;
+    std::vector<DiffMoment> moments; ///< never empty
+    std::vector<Difference> found;
+
+    /// Whether two numbers count as different.
+    [[nodiscard]] bool differ(double one, double other) const;
+    void add(DiffKind kind, const std::string& object, std::string what, std::string saysA, std::string saysB) {
+        found.push_back({kind, object, std::move(what), std::move(saysA), std::move(saysB), {}, {}, {}, 0});
+    }
+    /// Adds a number at the moment where it differs most, if it does. Where neither changes one moment is enough.
+    void addWorst(Difference difference, bool changes, const std::function<std::pair<double, double>(DiffMoment)>& at);
+};
+
+void compareFiles(Comparison& comparison);      // rate, unit, axes, takes
+void compareTrees(Comparison& comparison);      // nodes
+void compareTransforms(Comparison& comparison); // where nodes are
+void compareCameras(Comparison& comparison);
+void compareLights(Comparison& comparison);
+void compareCurves(Comparison& comparison);
+void compareMeshes(Comparison& comparison);
+
+} // namespace tool

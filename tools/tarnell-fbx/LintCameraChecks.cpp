@@ -1,0 +1,188 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Lens, film and place of cameras.
+#include <algorithm>
+#include <cmath>
+
+#include <fbxsdk/extensions/FileFacts.h>
+
+#include "CameraOrigins.h"
+#include "LintChecks.h"
+#include "SceneFacts.h"
+
+namespace tool {
+namespace {
+
+CameraMoment firstMoment(const LintContext& context, const CameraFacts& camera) {
+    return camera.at(static_cast<double>(context.first.firstFrame));
+}
+
+const FbxCamera& attributeOf(const CameraFacts& camera) { return *camera.node->GetCamera(); }
+
+bool isPositive(double number) { return std::isfinite(number) && number > 0.0; }
+
+double lengthTo(const CameraMoment& moment) {
+    return std::hypot(moment.interest[0] - moment.position[0], moment.interest[1] - moment.position[1],
+                      moment.interest[2] - moment.position[2]);
+}
+
+} // namespace
+
+void lensOutOfRange(const LintContext& context, LintReport& report) {
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        const CameraMoment moment = firstMoment(context, camera);
+        if (!isPositive(moment.focalLength) && !camera.orthographic)
+            report.add(camera.name, "a focal length of " + significant(moment.focalLength, 6) + " mm is none");
+        if (!isPositive(moment.film.width) || !isPositive(moment.film.height))
+            report.add(camera.name, "a film of " + filmText(moment.film) + " is none");
+    }
+}
+
+void lensValuesDisagree(const LintContext& context, LintReport& report) {
+    constexpr double kDegrees = 0.01, kMillimetres = 0.01;
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        if (camera.orthographic)
+            continue;
+        const CameraMoment moment = firstMoment(context, camera);
+        const FbxCamera& source = attributeOf(camera);
+        const struct {
+            FbxProperty property;
+            double inForce, tolerance;
+            const char* unit;
+        } rows[] = {{source.FocalLength, moment.focalLength, kMillimetres, " mm"},
+                    {source.FieldOfViewX, moment.fovX, kDegrees, "°"},
+                    {source.FieldOfViewY, moment.fovY, kDegrees, "°"}};
+        for (const auto& row : rows) {
+            const double stated = row.property.Get<FbxDouble>();
+            if (extensions::isStated(row.property) && !isInForce(camera, row.property) && !isAnimated(row.property) &&
+                !camera.lensChanges && std::abs(stated - row.inForce) > row.tolerance)
+                report.add(camera.name, std::string(row.property.GetName().Buffer()) + " is " + rounded(stated, 4) +
+                                            row.unit + ", and the lens, driven by " + driverText(camera.driver) +
+                                            ", has " + rounded(row.inForce, 4) + row.unit);
+        }
+    }
+}
+
+void filmShapeDiffers(const LintContext& context, LintReport& report) {
+    constexpr double kTolerance = 0.005;
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        const CameraMoment moment = firstMoment(context, camera);
+        const double film = moment.film.aspect();
+        if (camera.orthographic || camera.pictureAspect <= 0.0 || !isPositive(film) ||
+            std::abs(camera.pictureAspect / film - 1.0) <= kTolerance)
+            continue;
+        report.add(camera.name, "the film is " + rounded(film, 4) + ":1, the picture " +
+                                    rounded(camera.pictureAspect, 4) + ":1; gate fit " + gateFitName(camera.gateFit) +
+                                    " makes " + inDecimals(moment.fovX, 3) + "° × " + inDecimals(moment.fovY, 3) +
+                                    "° into " + inDecimals(moment.pictureFovX, 3) + "° × " +
+                                    inDecimals(moment.pictureFovY, 3) + "°");
+    }
+}
+
+void filmFormatDisagrees(const LintContext& context, LintReport& report) {
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        for (const IdleValue& idle : camera.idle) {
+            const FbxProperty property = attributeOf(camera).FindProperty(idle.property.c_str());
+            if ((idle.property == "FilmFormatIndex" || idle.property == "FilmAspectRatio") &&
+                extensions::isStated(property))
+                report.add(camera.name, idle.property + " is " + idle.shortValue + ", but " + idle.reason);
+        }
+    }
+}
+
+void squeezedFilm(const LintContext& context, LintReport& report) {
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        if (camera.squeeze != 1.0)
+            report.add(camera.name, "the squeeze ratio is " + rounded(camera.squeeze, 4));
+    }
+}
+
+void filmOffset(const LintContext& context, LintReport& report) {
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        const CameraMoment moment = firstMoment(context, camera);
+        if (moment.offsetX != 0.0 || moment.offsetY != 0.0)
+            report.add(camera.name, "the film is shifted by " + rounded(moment.offsetX, 6) + " × " +
+                                        rounded(moment.offsetY, 6) + " in");
+    }
+}
+
+void clipPlanes(const LintContext& context, LintReport& report) {
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        const CameraMoment moment = firstMoment(context, camera);
+        const bool nearIsOne = camera.orthographic ? std::isfinite(moment.nearPlane) : isPositive(moment.nearPlane);
+        if (!nearIsOne || !(moment.farPlane > moment.nearPlane))
+            report.add(camera.name, "near plane " + significant(moment.nearPlane, 6) + " cm, far plane " +
+                                        significant(moment.farPlane, 6) + " cm");
+    }
+}
+
+void clipPlanesFarApart(const LintContext& context, LintReport& report) {
+    // A float keeps 24 bits: with planes further apart most of them are spent right before the camera.
+    constexpr double kMostRatio = 16777216.0;
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        const CameraMoment moment = firstMoment(context, camera);
+        if (!camera.orthographic && isPositive(moment.nearPlane) && moment.farPlane / moment.nearPlane > kMostRatio)
+            report.add(camera.name, "the far plane is " + significant(moment.farPlane / moment.nearPlane, 3) +
+                                        " times as far as the near one");
+    }
+}
+
+void cameraScale(const LintContext& context, LintReport& report) {
+    constexpr double kTolerance = 1e-3;
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        const auto [least, most] = std::minmax_element(camera.scale.begin(), camera.scale.end());
+        if (*least < 0.0 || *most - *least > kTolerance * std::abs(*most))
+            report.add(camera.name, "it is scaled by " + vectorText(camera.scale, 4));
+    }
+}
+
+void rollWithoutTarget(const LintContext& context, LintReport& report) {
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        if (!camera.hasTarget && attributeOf(camera).Roll.Get() != 0.0)
+            report.add(camera.name, "a roll of " + rounded(attributeOf(camera).Roll.Get(), 4) +
+                                        "°, and no target: the node turns the camera");
+    }
+}
+
+void interestElsewhere(const LintContext& context, LintReport& report) {
+    constexpr double kCosine = 0.9998, kRadians = 0.017453292519943295769; // about a degree
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        const CameraMoment moment = firstMoment(context, camera);
+        const double away = lengthTo(moment);
+        double along = 0.0;
+        for (std::size_t axis = 0; axis < 3; ++axis)
+            along += (moment.interest[axis] - moment.position[axis]) * moment.direction[axis];
+        if (camera.hasTarget || !extensions::isStated(attributeOf(camera).InterestPosition) || !(away > 0.0) ||
+            along > kCosine * away)
+            continue;
+        report.add(camera.name, "the point of interest lies " +
+                                    rounded(std::acos(std::clamp(along / away, -1.0, 1.0)) / kRadians, 2) +
+                                    "° off the direction it looks in");
+    }
+}
+
+void imageShiftNotRead(const LintContext& context, LintReport& report) {
+    const std::string shifting[] = {"OpticalCenterX", "OpticalCenterY", "FilmTranslateX",
+                                    "FilmTranslateY", "FilmRollValue",  "PreScale"};
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        for (const IdleValue& idle : camera.idle) {
+            if (std::find(std::begin(shifting), std::end(shifting), idle.property) != std::end(shifting))
+                report.add(camera.name, idle.property + " is " + idle.shortValue);
+        }
+    }
+}
+
+void noResolution(const LintContext& context, LintReport& report) {
+    for (const CameraFacts& camera : context.cameras.cameras) {
+        const FbxCamera& source = attributeOf(camera);
+        if (camera.pictureAspect <= 0.0) {
+            report.add(camera.name, "a picture of " + rounded(camera.resolution[0], 3) + " × " +
+                                        rounded(camera.resolution[1], 3) + " is none");
+        } else if (!extensions::isStated(source.AspectWidth) && !extensions::isStated(source.AspectHeight)) {
+            report.add(camera.name, "the file states no resolution; 320 × 200 is what the format assumes");
+        }
+    }
+}
+
+} // namespace tool

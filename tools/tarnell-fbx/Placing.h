@@ -1,0 +1,18 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// From the channels of a faithful transform to its matrix.
+#pragma once
+
+#include <array>
+
+#include <fbxsdk.h>
+
+#include "TnFbxTransform.h"
+
+namespace tool {
+
+/// Position · rotation · shear · scale at a frame, the right one first.
+FbxAMatrix placeAt(const Tarnell::Fbx::TnFbxTransform& object, double frame);
+
+} // namespace tool
