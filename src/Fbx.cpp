@@ -5,10 +5,10 @@
 #include "Fbx.h"
 
 #include "FbxSdk.h"
+#include "access/NewFolders.h"
+#include "access/PointCachePlace.h"
 #include "calls/LastError.h"
 #include "faithful/Reading.h"
-#include "sdk/NewFolders.h"
-#include "sdk/PointCachePlace.h"
 
 #include <algorithm>
 #include <cstddef>
