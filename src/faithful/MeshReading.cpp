@@ -288,6 +288,7 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
     const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
     try {
         fillMesh(source, node, placed, cornerCount, mesh);
+        mesh.setPointsPlaced(info.getTransformPoints());
         return true;
     } catch (const std::runtime_error& error) { // what the platform says of a layer element without its array
         mesh.initMesh();

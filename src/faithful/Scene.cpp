@@ -2,6 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 #include "Scene.h"
 
+#include "Rates.h"
 #include "access/FileWarnings.h"
 #include "access/Normalisation.h"
 #include "calls/LastError.h"
@@ -35,19 +36,6 @@ std::vector<Object*> sourcesOf(Owner& owner) {
     }
     return objects;
 }
-
-/// The rates of television, of which the platform's are roundings.
-struct RateRow {
-    fbxsdk::FbxTime::EMode mode;
-    double rate;
-};
-constexpr RateRow kTelevisionRates[] = {
-    {fbxsdk::FbxTime::eFilmFullFrame, 24000.0 / 1001.0}, //
-    {fbxsdk::FbxTime::eNTSCDropFrame, 30000.0 / 1001.0}, //
-    {fbxsdk::FbxTime::eNTSCFullFrame, 30000.0 / 1001.0}, //
-    {fbxsdk::FbxTime::eFrames59dot94, 60000.0 / 1001.0}, //
-    {fbxsdk::FbxTime::eFrames119dot88, 120000.0 / 1001.0},
-};
 
 double exactRate(const fbxsdk::FbxGlobalSettings& settings) {
     const fbxsdk::FbxTime::EMode mode = settings.GetTimeMode();

@@ -35,7 +35,8 @@ public:
     float frame() const { return mFrame; }
     fbxsdk::FbxTime now() const { return mNow; }
 
-    /// Whether anything of the object is keyed in the stack.
+    /// Whether the property, or anything of the object, is keyed in the stack.
+    bool isKeyed(fbxsdk::FbxProperty property) const;
     bool isKeyed(const fbxsdk::FbxObject& object) const;
     /// Whether the node, or one that it hangs on, is keyed in its transform.
     bool moves(fbxsdk::FbxNode& node);
@@ -49,7 +50,6 @@ private:
     bool selectStack(const std::string& name);
     bool selectFrames(const TnFbxReadInfo& info);
     fbxsdk::FbxTimeSpan animatedSpan();
-    bool isKeyed(fbxsdk::FbxProperty property) const;
 
     detail::TimeModeScope mTimeMode;        // an import leaves the file's
     fbxsdk::FbxManager* mManager = nullptr; // owned
