@@ -270,7 +270,7 @@ void writeLookAt(WrittenScene& scene, TnFbxCamera& source, fbxsdk::FbxNode& node
     keys.write(camera.Roll, channelOf(source, TnFbxCamera::kFbxCameraRoll));
 
     const LookAt lookAt(keys, source);
-    const bool turns = lookAt.wantsAim();
+    const bool turns = scene.info().getComputeCameraRotation() && lookAt.wantsAim();
     if (!turns && !lookAt.isRolledAim()) { // the rotation says where it looks
         return;
     }

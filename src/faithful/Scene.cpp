@@ -113,16 +113,21 @@ bool Scene::selectStack(const std::string& name) {
 bool Scene::selectFrames(const TnFbxReadInfo& info) {
     const fbxsdk::FbxGlobalSettings& settings = mScene->GetGlobalSettings();
     fbxsdk::FbxTime::SetGlobalTimeMode(settings.GetTimeMode(), settings.GetCustomFrameRate());
-    const double rate = info.getUseSampleFPS() ? static_cast<double>(info.getSampleFPS()) : exactRate(settings);
+    mFileRate = exactRate(settings);
+    const double rate = info.getUseSampleFPS() ? exactRate(info.getSampleFPS()).rate : mFileRate;
     if (!std::isfinite(rate) || !(rate > 0.0)) {
         return fail("a sample rate of " + std::to_string(rate) + " frames per second is none");
     }
-    mFrame = info.getFrame();
-    if (!std::isfinite(mFrame)) {
+    mTimeline = Timeline(rate, animatedSpan());
+    return setFrame(info.getFrame());
+}
+
+bool Scene::setFrame(float frame) {
+    if (!std::isfinite(frame)) {
         return fail("the frame of the static values is no number");
     }
-    mTimeline = Timeline(rate, animatedSpan());
-    mNow = mTimeline.at(static_cast<double>(mFrame));
+    mFrame = frame;
+    mNow = mTimeline.at(static_cast<double>(frame));
     return true;
 }
 
