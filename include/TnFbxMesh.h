@@ -85,6 +85,12 @@ public:
     bool setValidColours(bool valid);
     bool getValidColours() const;
 
+    /// Whether the points are multiplied by the mesh's transform already, as a faithful read with
+    /// `setTransformPoints(true)` leaves them: a faithful write takes it out of them again. Default false; the setter
+    /// is always true.
+    bool setPointsPlaced(bool placed);
+    bool getPointsPlaced() const;
+
     int getNumberOfPolygons() const;
     int getNumberOfPolygonVertices() const;
     int getNumberOfControlPoints() const; ///< Of one set.
@@ -115,6 +121,7 @@ private:
         bool validNormals = false;
         bool validUVs = false;
         bool validColours = false;
+        bool pointsPlaced = false;
     };
 
     Geometry mGeometry;

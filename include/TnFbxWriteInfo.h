@@ -45,7 +45,7 @@ public:
     const std::string& getFileName() const; ///< FBX file to write; point caches are named after it.
 
     bool setAnimationStackName(const std::string& animationStackName);
-    const std::string& getAnimationStackName() const;
+    const std::string& getAnimationStackName() const; ///< Of a faithful write, where an empty one is "Take 001".
 
     bool setFileFormat(bool fileFormat);
     bool getFileFormat() const; ///< True: ASCII; false: binary. Default true.
@@ -82,8 +82,14 @@ public:
     bool setCompatibilityVersion(eCompatibilityVersion compatibilityVersion);
     eCompatibilityVersion getCompatibilityVersion() const; ///< Default `kFbxVersion2016`.
 
+    /// Faithful: what is written comes back; the stack bears its name, and fractions of the first and last frame belong
+    /// to the span.
     bool setFidelity(EFbxFidelity fidelity);
-    EFbxFidelity getFidelity() const; ///< Kept for the host; writing does not look at it yet. Default compatible.
+    EFbxFidelity getFidelity() const; ///< What the file says of the objects; see docs/faithful.md. Default compatible.
+
+    bool setComputeCameraRotation(bool computeCameraRotation);
+    /// A faithful write turns cameras that have a look-at point and no rotation toward the point. Default true.
+    bool getComputeCameraRotation() const;
 
 private:
     struct Options {
@@ -101,6 +107,7 @@ private:
         float startFrame = kDefaultStartFrame;
         float endFrame = kDefaultEndFrame;
         EFbxFidelity fidelity = kFbxFidelityCompatible;
+        bool computeCameraRotation = true;
     };
 
     Options mOptions;

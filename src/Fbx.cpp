@@ -5,10 +5,11 @@
 #include "Fbx.h"
 
 #include "FbxSdk.h"
+#include "access/NewFolders.h"
+#include "access/PointCachePlace.h"
 #include "calls/LastError.h"
 #include "faithful/Reading.h"
-#include "sdk/NewFolders.h"
-#include "sdk/PointCachePlace.h"
+#include "faithful/Writing.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -172,11 +173,19 @@ bool Fbx::writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>&
     if (info.getFileName().empty()) {
         return fail("the write options name no file");
     }
-    if (info.getAnimationStackName().empty()) { // kept: the name is asked for, though the written stack bears another
+    const bool faithfully = info.getFidelity() == kFbxFidelityFaithful;
+    if (!faithfully && info.getAnimationStackName().empty()) { // kept: it is asked for, though the stack bears another
         return fail("the write options name no animation stack");
     }
     const auto place = detail::pointCachePlace(info.getFileName(), /*nodeName*/ "", /*extension*/ "");
     detail::NewFolders folders(std::string(place.folder)); // goes after the context, which takes its files away
+    if (faithfully) {
+        const bool written = faithful::writeObjects(info, cameras, lights, transforms, nulls, meshes);
+        if (written) {
+            folders.keep();
+        }
+        return written;
+    }
     FbxSdk sdk;
     if (!sdk.initFbxSdkManager()) {
         return false;

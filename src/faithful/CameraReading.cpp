@@ -2,13 +2,13 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Cameras: where they look, what drives their lens, and the film behind it, all of it worked out at every frame.
+#include "Aim.h"
+#include "Lens.h"
 #include "Placement.h"
 #include "Reading.h"
 #include "Sampling.h"
 
 #include <array>
-#include <cmath>
-#include <optional>
 
 namespace Tarnell::Fbx::faithful {
 
@@ -20,27 +20,9 @@ using fbxsdk::FbxNode;
 using fbxsdk::FbxTime;
 using fbxsdk::FbxVector4;
 
-constexpr double kMillimetresPerInch = 25.4;
-constexpr double kRadians = 0.017453292519943295769;
 constexpr std::size_t kChannels = TnFbxCamera::kFbxCameraFilmOffsetY + 1;
 
 // ---- Lens and film ----
-
-struct Lens {
-    double focalLength;                             // millimetres
-    double width, height;                           // of the film, inches
-    double fieldOfView, fieldOfViewX, fieldOfViewY; // degrees
-};
-
-bool isAngle(double degrees) { return degrees > 0.0 && degrees < 180.0; }
-
-double focalLengthOf(double inches, double degrees) {
-    return inches * kMillimetresPerInch / 2.0 / std::tan(degrees / 2.0 * kRadians);
-}
-
-double angleOf(double inches, double focalLength) {
-    return 2.0 * std::atan2(inches * kMillimetresPerInch / 2.0, focalLength) / kRadians;
-}
 
 /// The focal length, both angles and the film agree: what the mode says drives the lens, and the rest follows.
 Lens lensAt(FbxCamera& source, TnFbxCamera::EFbxCameraApertureMode mode, const FbxTime& time) {
@@ -48,22 +30,10 @@ Lens lensAt(FbxCamera& source, TnFbxCamera::EFbxCameraApertureMode mode, const F
     lens.width = source.FilmWidth.EvaluateValue(time) * source.FilmSqueezeRatio.EvaluateValue(time);
     lens.height = source.FilmHeight.EvaluateValue(time);
     lens.focalLength = source.FocalLength.EvaluateValue(time);
-    const double angle = source.FieldOfView.EvaluateValue(time);
-    const double angleX = source.FieldOfViewX.EvaluateValue(time);
-    const double angleY = source.FieldOfViewY.EvaluateValue(time);
-    if (mode == TnFbxCamera::kFbxApertureHorizontal && isAngle(angle)) {
-        lens.focalLength = focalLengthOf(lens.width, angle);
-    } else if (mode == TnFbxCamera::kFbxApertureVertical && isAngle(angle)) {
-        lens.focalLength = focalLengthOf(lens.height, angle);
-    } else if (mode == TnFbxCamera::kFbxApertureHorizontalAndVertical && isAngle(angleX) && isAngle(angleY)) {
-        // Two angles give the film its shape; its width is believed.
-        lens.focalLength = focalLengthOf(lens.width, angleX);
-        lens.height = 2.0 * lens.focalLength * std::tan(angleY / 2.0 * kRadians) / kMillimetresPerInch;
-    }
-    lens.fieldOfViewX = angleOf(lens.width, lens.focalLength);
-    lens.fieldOfViewY = angleOf(lens.height, lens.focalLength);
-    lens.fieldOfView = mode == TnFbxCamera::kFbxApertureVertical ? lens.fieldOfViewY : lens.fieldOfViewX;
-    return lens;
+    lens.fieldOfView = source.FieldOfView.EvaluateValue(time);
+    lens.fieldOfViewX = source.FieldOfViewX.EvaluateValue(time);
+    lens.fieldOfViewY = source.FieldOfViewY.EvaluateValue(time);
+    return agreeing(lens, mode);
 }
 
 TnFbxCamera::EFbxCameraApertureMode apertureModeOf(const FbxCamera& source) {
@@ -84,28 +54,6 @@ TnFbxCamera::EFbxCameraApertureMode apertureModeOf(const FbxCamera& source) {
 FbxVector4 asVector(const fbxsdk::FbxDouble3& value) { return {value[0], value[1], value[2]}; }
 
 FbxVector4 minus(const FbxVector4& a, const FbxVector4& b) { return {a[0] - b[0], a[1] - b[1], a[2] - b[2]}; }
-
-FbxVector4 crossProduct(const FbxVector4& a, const FbxVector4& b) {
-    return {a[1] * b[2] - a[2] * b[1], a[2] * b[0] - a[0] * b[2], a[0] * b[1] - a[1] * b[0]};
-}
-
-double lengthOf(const FbxVector4& a) { return std::sqrt(a[0] * a[0] + a[1] * a[1] + a[2] * a[2]); }
-
-/// Of unit length; nothing where there is none.
-std::optional<FbxVector4> direction(const FbxVector4& a) {
-    const double length = lengthOf(a);
-    if (!(length > 1e-12) || !std::isfinite(length)) {
-        return std::nullopt;
-    }
-    return FbxVector4(a[0] / length, a[1] / length, a[2] / length);
-}
-
-/// Cameras of files look along X with Y up, those of hosts along −Z.
-FbxAMatrix cameraAxes() {
-    FbxAMatrix turn;
-    turn.SetR(FbxVector4(0.0, -90.0, 0.0));
-    return turn;
-}
 
 /// What a camera looks at, in the world.
 class Aim {
@@ -131,36 +79,8 @@ public:
 
     /// The camera in the world, turned toward the point and rolled; the node's own turn where that has no direction.
     FbxAMatrix matrixAt(const FbxTime& time) const {
-        FbxAMatrix matrix = worldMatrix(mNode, time) * cameraAxes();
-        const std::optional<FbxVector4> back = direction(minus(matrix.GetT(), pointAt(time)));
-        if (!back) {
-            return matrix;
-        }
-        std::optional<FbxVector4> right = direction(crossProduct(upAt(time), *back));
-        if (!right) {
-            right = direction(crossProduct(matrix.GetRow(1), *back));
-        }
-        if (!right) {
-            return matrix;
-        }
-        const FbxVector4 up = crossProduct(*back, *right);
-        const FbxVector4 axes[3] = {*right, up, *back};
-        FbxAMatrix roll;
-        roll.SetR(FbxVector4(0.0, 0.0, -mCamera.Roll.EvaluateValue(time)));
-        FbxAMatrix turned;
-        for (int axis = 0; axis < 3; ++axis) {
-            for (int component = 0; component < 3; ++component) {
-                turned[axis][component] = axes[axis][component];
-            }
-        }
-        turned = turned * roll;
-        for (int axis = 0; axis < 3; ++axis) {
-            const double size = lengthOf(matrix.GetRow(axis));
-            for (int component = 0; component < 3; ++component) {
-                matrix[axis][component] = turned[axis][component] * size;
-            }
-        }
-        return matrix;
+        return aimed(worldMatrix(mNode, time) * turnOf(kCameraTurn), pointAt(time), upAt(time),
+                     mCamera.Roll.EvaluateValue(time));
     }
 
 private:
@@ -173,9 +93,10 @@ Placement cameraPlacement(Scene& scene, FbxNode& node, const TnFbxReadInfo& info
     const bool global = info.getGlobalTransform();
     const bool looksAt = aim.hasTarget() || info.getComputeCameraRotation();
     Placement placement = placementOf(scene, node, global);
-    placement.ownAngles = false;
+    placement.ownAngles = !looksAt; // they are the angles of cameras that the library writes
+    placement.nearOwn = false;
     if (!looksAt) {
-        placement.matrixAt = [place = placement.matrixAt, turn = cameraAxes()](const FbxTime& time) {
+        placement.matrixAt = [place = placement.matrixAt, turn = turnOf(kCameraTurn)](const FbxTime& time) {
             return place(time) * turn;
         };
         return placement;

@@ -165,7 +165,7 @@ bool applyPointCache(Scene& scene, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh,
     std::vector<double> buffer(points.size() * 3);
     const bool maya = cache.GetCacheFileFormat() == fbxsdk::FbxCache::eMayaCache;
     const bool read = open.isOpen() && (maya ? readMayaCache(cache, deformer->Channel.Get(), time, buffer)
-                                             : readMaxCache(cache, time.GetFrameCountPrecise(), buffer));
+                                             : readMaxCache(cache, time.GetSecondDouble() * scene.fileRate(), buffer));
     if (!read) {
         detail::warn(scene.fileName() + ": the point cache of \"" + node.GetName() +
                      "\" cannot be read; its mesh is handed out without it");

@@ -2,6 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Lights, markers, nulls and plain transforms.
+#include "Aim.h"
 #include "Placement.h"
 #include "Reading.h"
 #include "Sampling.h"
@@ -19,19 +20,12 @@ namespace {
 using fbxsdk::FbxNode;
 using fbxsdk::FbxTime;
 
-/// Lights of files shine along −Y, those of hosts along −Z.
-fbxsdk::FbxAMatrix lightAxes() {
-    fbxsdk::FbxAMatrix turn;
-    turn.SetR(fbxsdk::FbxVector4(-90.0, 0.0, 0.0));
-    return turn;
-}
-
 Placement lightPlacement(Scene& scene, FbxNode& node, bool global) {
     Placement placement = placementOf(scene, node, global);
-    placement.matrixAt = [place = placement.matrixAt, turn = lightAxes()](const FbxTime& time) {
+    placement.matrixAt = [place = placement.matrixAt, turn = turnOf(kLightTurn)](const FbxTime& time) {
         return place(time) * turn;
     };
-    placement.ownAngles = false;
+    placement.nearOwn = false; // they fit where they turn a light with the axes of hosts
     return placement;
 }
 

@@ -288,12 +288,30 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
     const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
     try {
         fillMesh(source, node, placed, cornerCount, mesh);
+        mesh.setPointsPlaced(info.getTransformPoints());
         return true;
     } catch (const std::runtime_error& error) { // what the platform says of a layer element without its array
         mesh.initMesh();
         return detail::fail(scene.fileName() + ": the layers of \"" + node.GetName() + "\" are damaged (" +
                             error.what() + ")");
     }
+}
+
+bool addPoints(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh& mesh) {
+    FbxMesh& source = *node.GetMesh();
+    if (!scene.grantBytes(static_cast<std::uint64_t>(mesh.getNumberOfControlPoints()) * 3 * sizeof(float))) {
+        return false;
+    }
+    const FbxTime time = scene.now();
+    const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
+    if (placed.points().size() != static_cast<std::size_t>(mesh.getNumberOfControlPoints())) {
+        return detail::fail(scene.fileName() + ": \"" + node.GetName() + "\" has other points than it had");
+    }
+    mesh.addControlPointSet();
+    for (const FbxVector4& point : placed.points()) {
+        mesh.addControlPoint(toFloat(point[0]), toFloat(point[1]), toFloat(point[2]));
+    }
+    return true;
 }
 
 } // namespace Tarnell::Fbx::faithful

@@ -5,10 +5,7 @@
 #include "Sampling.h"
 #include "access/RotationOrders.h"
 
-#include <algorithm>
 #include <array>
-#include <cmath>
-#include <vector>
 
 namespace Tarnell::Fbx::faithful {
 
@@ -90,54 +87,97 @@ void readStill(Scene& scene, const Placement& placement, RotationOrder order, Tn
     OwnAngles own(placement, order);
     const Vector hint = own.at(scene.now());
     own.compare(hint, parts.rotation);
-    const Vector near = placement.ownAngles ? hint : Vector{};
+    const Vector near = placement.nearOwn ? hint : Vector{};
     setStill(object, valuesOf(parts, own.fit() ? hint : anglesNear(parts.rotation, order, near)));
 }
 
-/// One vector per channel, and the node's own angles as long as they fit.
-struct Samples {
-    std::array<std::vector<float>, kChannels> channels;
-    std::array<std::vector<float>, 3> ownAngles;
-};
-
-bool readMoving(Scene& scene, const Placement& placement, RotationOrder order, TnFbxTransform& object) {
-    if (!scene.grantSamples(kChannels)) {
-        return false;
-    }
-    const Timeline& timeline = scene.timeline();
-    Samples samples;
-    for (std::vector<float>& channel : samples.channels) {
-        channel.reserve(static_cast<std::size_t>(timeline.count()));
-    }
-    OwnAngles own(placement, order);
-    Vector angles = placement.ownAngles ? own.at(timeline.at(static_cast<double>(timeline.first()))) : Vector{};
-    Vector nearNow = angles;
-    for (std::int64_t frame = timeline.first(); frame <= timeline.last(); ++frame) {
-        const FbxTime time = timeline.at(static_cast<double>(frame));
-        const Parts parts = partsAt(placement, time);
-        angles = anglesNear(parts.rotation, order, angles);
-        if (static_cast<double>(frame) <= static_cast<double>(scene.frame())) {
-            nearNow = angles;
-        }
-        const Values values = valuesOf(parts, angles);
-        for (std::size_t i = 0; i < kChannels; ++i) {
-            samples.channels[i].push_back(toFloat(values[i]));
-        }
-        if (own.fit()) {
-            const Vector ownAngles = own.at(time);
-            own.compare(ownAngles, parts.rotation);
-            for (std::size_t i = 0; i < 3; ++i) {
-                samples.ownAngles[i].push_back(toFloat(ownAngles[i]));
+/// Whether two matrices are the same but for where they are.
+bool standAlike(const Matrix& a, const Matrix& b) {
+    for (int axis = 0; axis < 3; ++axis) {
+        for (int component = 0; component < 3; ++component) {
+            if (!(a.Get(axis, component) == b.Get(axis, component))) {
+                return false;
             }
         }
     }
-    if (own.fit()) {
-        std::move(samples.ownAngles.begin(), samples.ownAngles.end(), samples.channels.begin() + 3);
+    return true;
+}
+
+/// The placement at one frame after the other. What does not turn or grow is taken apart once.
+class MovingPlacement {
+public:
+    MovingPlacement(Scene& scene, const Placement& placement, RotationOrder order)
+        : mPlacement(placement), mOrder(order), mOwn(placement, order),
+          mOwnChanges(scene.isKeyed(placement.node.LclRotation) || scene.isKeyed(placement.node.LclScaling)) {}
+
+    void begin(const FbxTime& time) {
+        mOwnAngles = mOwn.at(time);
+        mAngles = mPlacement.nearOwn ? mOwnAngles : Vector{};
     }
+
+    Values at(const FbxTime& time) {
+        const Matrix matrix = mPlacement.matrixAt(time);
+        if (mAny && !mOwnChanges && standAlike(matrix, mMatrix)) {
+            for (int i = 0; i < 3; ++i) {
+                mParts.position[static_cast<std::size_t>(i)] = matrix.Get(3, i);
+            }
+            return valuesOf(mParts, mAngles);
+        }
+        mAny = true;
+        mMatrix = matrix;
+        mParts = decompose(matrix, valueAt(mPlacement.node.LclScaling, time));
+        mAngles = anglesNear(mParts.rotation, mOrder, mAngles);
+        if (mOwn.fit()) {
+            mOwnAngles = mOwn.at(time);
+            mOwn.compare(mOwnAngles, mParts.rotation);
+        }
+        return valuesOf(mParts, mAngles);
+    }
+
+    const Vector& angles() const { return mAngles; }
+    const OwnAngles& own() const { return mOwn; }
+    const Vector& ownAngles() const { return mOwnAngles; }
+
+private:
+    const Placement& mPlacement;
+    RotationOrder mOrder;
+    OwnAngles mOwn;
+    bool mOwnChanges;
+    bool mAny = false;
+    Matrix mMatrix;
+    Parts mParts;
+    Vector mAngles{}, mOwnAngles{};
+};
+
+bool readMoving(Scene& scene, const Placement& placement, RotationOrder order, TnFbxTransform& object) {
+    const Timeline& timeline = scene.timeline();
+    if (!scene.grantSamples(0)) {
+        return false;
+    }
+    Runs<kChannels> samples(scene);
+    Runs<3> ownAngles(scene);
+    MovingPlacement moving(scene, placement, order);
+    moving.begin(timeline.at(static_cast<double>(timeline.first())));
+    Vector nearNow = moving.angles();
+    for (std::int64_t frame = timeline.first(); frame <= timeline.last(); ++frame) {
+        if (!samples.add(moving.at(timeline.at(static_cast<double>(frame))))) {
+            return false;
+        }
+        if (static_cast<double>(frame) <= static_cast<double>(scene.frame())) {
+            nearNow = moving.angles();
+        }
+        if (moving.own().fit() && !ownAngles.add(moving.ownAngles())) {
+            return false;
+        }
+    }
+    const bool isOwn = moving.own().fit();
     const Parts now = partsAt(placement, scene.now());
-    setStill(object, valuesOf(now, own.fit() ? own.at(scene.now()) : anglesNear(now.rotation, order, nearNow)));
+    setStill(object, valuesOf(now, isOwn ? moving.own().at(scene.now()) : anglesNear(now.rotation, order, nearNow)));
     for (std::size_t i = 0; i < kChannels; ++i) {
-        setSamplesThatDiffer(object, channelAt(i), timeline.record(scene.frame()), std::move(samples.channels[i]));
+        detail::SampleRun& run = isOwn && i >= 3 && i < 6 ? ownAngles[i - 3] : samples[i];
+        if (!run.isOneValue()) {
+            run.moveInto(*object.getTransformChannel(channelAt(i)), timeline.record(scene.frame()));
+        }
     }
     return true;
 }
@@ -170,7 +210,8 @@ Matrix geometricMatrix(const FbxNode& node) {
 
 Placement placementOf(Scene& scene, FbxNode& node, bool global) {
     const auto matrixAt = global ? worldMatrix : localMatrix;
-    return {node, [&node, matrixAt](const FbxTime& time) { return matrixAt(node, time); }, scene.moves(node), true};
+    return {node, [&node, matrixAt](const FbxTime& time) { return matrixAt(node, time); }, scene.moves(node), true,
+            true};
 }
 
 bool readPlacement(Scene& scene, const Placement& placement, TnFbxTransform& object) {

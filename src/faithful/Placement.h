@@ -33,6 +33,7 @@ struct Placement {
     std::function<fbxsdk::FbxAMatrix(const fbxsdk::FbxTime&)> matrixAt;
     bool moves;
     bool ownAngles; ///< the node's own angles are tried first
+    bool nearOwn;   ///< others begin near to them
 };
 
 /// The placement of a node as it is: in the world, or from its parent.

@@ -63,20 +63,6 @@ constexpr bool kNeedsMeshes = false;
 template <>
 constexpr bool kNeedsMeshes<TnFbxMesh> = true;
 
-void triangulateSurfaces(Scene& scene) {
-    detail::Triangulation triangulation(scene.manager());
-    detail::walkNodes(scene.scene().GetRootNode(), [&](FbxNode& node) {
-        triangulation.visit(node);
-        const Attribute::EType type = typeOf(node);
-        if (type == Attribute::eNurbs || type == Attribute::ePatch || type == Attribute::eNurbsSurface ||
-            type == Attribute::eTrimNurbsSurface) {
-            detail::warn(scene.fileName() + ": the surface of \"" + node.GetName() + "\" cannot become a mesh");
-        }
-        return true;
-    });
-    triangulation.warnOfCoarser();
-}
-
 /// The nodes that a read is about, parents before their children.
 template <class Object>
 std::vector<FbxNode*> nodesOf(Scene& scene, const TnFbxReadInfo& info) {
@@ -96,12 +82,22 @@ std::vector<FbxNode*> nodesOf(Scene& scene, const TnFbxReadInfo& info) {
 
 } // namespace
 
+void triangulateSurfaces(Scene& scene) {
+    detail::Triangulation triangulation(scene.manager());
+    detail::walkNodes(scene.scene().GetRootNode(), [&](FbxNode& node) {
+        triangulation.visit(node);
+        const Attribute::EType type = typeOf(node);
+        if (type == Attribute::eNurbs || type == Attribute::ePatch || type == Attribute::eNurbsSurface ||
+            type == Attribute::eTrimNurbsSurface) {
+            detail::warn(scene.fileName() + ": the surface of \"" + node.GetName() + "\" cannot become a mesh");
+        }
+        return true;
+    });
+    triangulation.warnOfCoarser();
+}
+
 template <class Object>
-bool readObjects(const TnFbxReadInfo& info, Object** objects, int& count) {
-    Scene scene;
-    if (!scene.load(info)) {
-        return false;
-    }
+bool readObjects(Scene& scene, const TnFbxReadInfo& info, Object** objects, int& count) {
     const std::vector<FbxNode*> nodes = nodesOf<Object>(scene, info);
     if (!scene.grantBytes(nodes.size() * sizeof(Object))) {
         return false;
@@ -120,11 +116,25 @@ bool readObjects(const TnFbxReadInfo& info, Object** objects, int& count) {
     return detail::succeed();
 }
 
+template <class Object>
+bool readObjects(const TnFbxReadInfo& info, Object** objects, int& count) {
+    return detail::failOnFault(info.getFileName(), [&] {
+        Scene scene;
+        return scene.load(info) && readObjects(scene, info, objects, count);
+    });
+}
+
 template bool readObjects(const TnFbxReadInfo&, TnFbxMesh**, int&);
+template bool readObjects(Scene&, const TnFbxReadInfo&, TnFbxMesh**, int&);
 template bool readObjects(const TnFbxReadInfo&, TnFbxCamera**, int&);
+template bool readObjects(Scene&, const TnFbxReadInfo&, TnFbxCamera**, int&);
 template bool readObjects(const TnFbxReadInfo&, TnFbxLight**, int&);
+template bool readObjects(Scene&, const TnFbxReadInfo&, TnFbxLight**, int&);
 template bool readObjects(const TnFbxReadInfo&, TnFbxMarker**, int&);
+template bool readObjects(Scene&, const TnFbxReadInfo&, TnFbxMarker**, int&);
 template bool readObjects(const TnFbxReadInfo&, TnFbxNull**, int&);
+template bool readObjects(Scene&, const TnFbxReadInfo&, TnFbxNull**, int&);
 template bool readObjects(const TnFbxReadInfo&, TnFbxTransform**, int&);
+template bool readObjects(Scene&, const TnFbxReadInfo&, TnFbxTransform**, int&);
 
 } // namespace Tarnell::Fbx::faithful

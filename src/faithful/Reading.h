@@ -21,6 +21,13 @@ namespace Tarnell::Fbx::faithful {
 template <class Object>
 bool readObjects(const TnFbxReadInfo& info, Object** objects, int& count);
 
+/// The same of a scene that is loaded.
+template <class Object>
+bool readObjects(Scene& scene, const TnFbxReadInfo& info, Object** objects, int& count);
+
+/// Puts meshes in the place of surfaces, and warns of those that cannot become any.
+void triangulateSurfaces(Scene& scene);
+
 extern template bool readObjects(const TnFbxReadInfo&, TnFbxMesh**, int&);
 extern template bool readObjects(const TnFbxReadInfo&, TnFbxCamera**, int&);
 extern template bool readObjects(const TnFbxReadInfo&, TnFbxLight**, int&);
@@ -36,5 +43,8 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, Tn
 bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxMarker& marker);
 bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxNull& null);
 bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxTransform& transform);
+
+/// The points of a mesh at the scene's frame as one more set of an object that was read from the node.
+bool addPoints(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxMesh& mesh);
 
 } // namespace Tarnell::Fbx::faithful

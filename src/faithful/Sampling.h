@@ -7,12 +7,10 @@
 #include "Scene.h"
 
 #include "TnFbxTransform.h"
+#include "access/SampleRun.h"
 
-#include <algorithm>
 #include <array>
 #include <cstddef>
-#include <utility>
-#include <vector>
 
 namespace Tarnell::Fbx::faithful {
 
@@ -29,22 +27,35 @@ void setStatic(Object& object, Channel channel, float value) {
     object.setValue(channel, value);
 }
 
-inline void setSamples(TnFbxTransform& object, TransformChannel channel, const TnFbxTime& time,
-                       std::vector<float>&& samples) {
-    object.setTransformValueAt(channel, time, std::move(samples));
-}
-template <class Object, class Channel>
-void setSamples(Object& object, Channel channel, const TnFbxTime& time, std::vector<float>&& samples) {
-    object.setValueAt(channel, time, std::move(samples));
-}
-
-/// Samples that are all alike are no animation.
-template <class Object, class Channel>
-void setSamplesThatDiffer(Object& object, Channel channel, const TnFbxTime& time, std::vector<float>&& samples) {
-    if (std::adjacent_find(samples.begin(), samples.end(), std::not_equal_to<>()) != samples.end()) {
-        setSamples(object, channel, time, std::move(samples));
+/// The samples of all channels while they are made. Only those that change take memory for each frame.
+template <std::size_t kCount>
+class Runs {
+public:
+    explicit Runs(Scene& scene) : mScene(scene) {
+        for (detail::SampleRun& run : mRuns) {
+            run.begin(static_cast<std::size_t>(scene.timeline().count()));
+        }
     }
-}
+
+    /// False, with the reason noted, when there is no room.
+    template <class Values>
+    bool add(const Values& values) {
+        for (std::size_t i = 0; i < kCount; ++i) {
+            const float value = toFloat(values[i]) + 0.0f; // zero is not told from minus zero
+            if (mRuns[i].spreadsWith(value) && !mScene.grantSamples(1)) {
+                return false;
+            }
+            mRuns[i].add(value);
+        }
+        return true;
+    }
+
+    detail::SampleRun& operator[](std::size_t i) { return mRuns[i]; }
+
+private:
+    Scene& mScene;
+    std::array<detail::SampleRun, kCount> mRuns;
+};
 
 /// Fills some consecutive channels, from the first one on: `valuesAt(time)` gives an array of their values. False, with
 /// the reason noted, when there is no room for the samples.
@@ -60,22 +71,20 @@ bool fillChannels(Scene& scene, bool animated, Object& object, Channel firstChan
     if (!animated) {
         return true;
     }
-    if (!scene.grantSamples(static_cast<std::int64_t>(kCount))) {
+    if (!scene.grantSamples(0)) {
         return false;
     }
     const Timeline& timeline = scene.timeline();
-    std::array<std::vector<float>, kCount> samples;
-    for (std::vector<float>& channel : samples) {
-        channel.reserve(static_cast<std::size_t>(timeline.count()));
-    }
+    Runs<kCount> samples(scene);
     for (std::int64_t frame = timeline.first(); frame <= timeline.last(); ++frame) {
-        const std::array<double, kCount> values = valuesAt(timeline.at(static_cast<double>(frame)));
-        for (std::size_t i = 0; i < kCount; ++i) {
-            samples[i].push_back(toFloat(values[i]));
+        if (!samples.add(valuesAt(timeline.at(static_cast<double>(frame))))) {
+            return false;
         }
     }
     for (std::size_t i = 0; i < kCount; ++i) {
-        setSamplesThatDiffer(object, channelAt(i), timeline.record(scene.frame()), std::move(samples[i]));
+        if (!samples[i].isOneValue()) { // samples that are all alike are no animation
+            object.setValueAt(channelAt(i), timeline.record(scene.frame()), samples[i].takeAll());
+        }
     }
     return true;
 }

@@ -2,6 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 #include "Scene.h"
 
+#include "Rates.h"
 #include "access/FileWarnings.h"
 #include "access/Normalisation.h"
 #include "calls/LastError.h"
@@ -35,19 +36,6 @@ std::vector<Object*> sourcesOf(Owner& owner) {
     }
     return objects;
 }
-
-/// The rates of television, of which the platform's are roundings.
-struct RateRow {
-    fbxsdk::FbxTime::EMode mode;
-    double rate;
-};
-constexpr RateRow kTelevisionRates[] = {
-    {fbxsdk::FbxTime::eFilmFullFrame, 24000.0 / 1001.0}, //
-    {fbxsdk::FbxTime::eNTSCDropFrame, 30000.0 / 1001.0}, //
-    {fbxsdk::FbxTime::eNTSCFullFrame, 30000.0 / 1001.0}, //
-    {fbxsdk::FbxTime::eFrames59dot94, 60000.0 / 1001.0}, //
-    {fbxsdk::FbxTime::eFrames119dot88, 120000.0 / 1001.0},
-};
 
 double exactRate(const fbxsdk::FbxGlobalSettings& settings) {
     const fbxsdk::FbxTime::EMode mode = settings.GetTimeMode();
@@ -125,16 +113,21 @@ bool Scene::selectStack(const std::string& name) {
 bool Scene::selectFrames(const TnFbxReadInfo& info) {
     const fbxsdk::FbxGlobalSettings& settings = mScene->GetGlobalSettings();
     fbxsdk::FbxTime::SetGlobalTimeMode(settings.GetTimeMode(), settings.GetCustomFrameRate());
-    const double rate = info.getUseSampleFPS() ? static_cast<double>(info.getSampleFPS()) : exactRate(settings);
+    mFileRate = exactRate(settings);
+    const double rate = info.getUseSampleFPS() ? exactRate(info.getSampleFPS()).rate : mFileRate;
     if (!std::isfinite(rate) || !(rate > 0.0)) {
         return fail("a sample rate of " + std::to_string(rate) + " frames per second is none");
     }
-    mFrame = info.getFrame();
-    if (!std::isfinite(mFrame)) {
+    mTimeline = Timeline(rate, animatedSpan());
+    return setFrame(info.getFrame());
+}
+
+bool Scene::setFrame(float frame) {
+    if (!std::isfinite(frame)) {
         return fail("the frame of the static values is no number");
     }
-    mTimeline = Timeline(rate, animatedSpan());
-    mNow = mTimeline.at(static_cast<double>(mFrame));
+    mFrame = frame;
+    mNow = mTimeline.at(static_cast<double>(frame));
     return true;
 }
 

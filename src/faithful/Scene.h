@@ -27,15 +27,21 @@ public:
     /// Once. False, with the reason noted, when the file cannot be read or has not what the options name.
     bool load(const TnFbxReadInfo& info);
 
+    bool isLoaded() const { return mScene != nullptr; }
     fbxsdk::FbxManager* manager() const { return mManager; }
     fbxsdk::FbxScene& scene() const { return *mScene; }
     const std::string& fileName() const { return mFileName; }
     const Timeline& timeline() const { return mTimeline; }
+    /// Frames per second of the file, exactly.
+    double fileRate() const { return mFileRate; }
     /// The frame of the static values, and its time.
     float frame() const { return mFrame; }
     fbxsdk::FbxTime now() const { return mNow; }
+    /// Another one; false, with the reason noted, when it is no number.
+    bool setFrame(float frame);
 
-    /// Whether anything of the object is keyed in the stack.
+    /// Whether the property, or anything of the object, is keyed in the stack.
+    bool isKeyed(fbxsdk::FbxProperty property) const;
     bool isKeyed(const fbxsdk::FbxObject& object) const;
     /// Whether the node, or one that it hangs on, is keyed in its transform.
     bool moves(fbxsdk::FbxNode& node);
@@ -44,12 +50,13 @@ public:
     bool grantSamples(std::int64_t channels);
     /// The same for other bytes that are handed out.
     bool grantBytes(std::uint64_t bytes);
+    /// What was granted is no longer held.
+    void forgetMemory() { mMemory.begin(); }
 
 private:
     bool selectStack(const std::string& name);
     bool selectFrames(const TnFbxReadInfo& info);
     fbxsdk::FbxTimeSpan animatedSpan();
-    bool isKeyed(fbxsdk::FbxProperty property) const;
 
     detail::TimeModeScope mTimeMode;        // an import leaves the file's
     fbxsdk::FbxManager* mManager = nullptr; // owned
@@ -58,6 +65,7 @@ private:
     fbxsdk::FbxAnimStack* mStack = nullptr; // null: nothing is animated
     std::vector<fbxsdk::FbxAnimLayer*> mLayers;
     Timeline mTimeline;
+    double mFileRate = 24.0;
     float mFrame = 0.0f;
     fbxsdk::FbxTime mNow;
     detail::MemoryAccount mMemory;

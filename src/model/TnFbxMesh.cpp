@@ -69,7 +69,7 @@ bool TnFbxMesh::initMesh() {
     g.normals.clear();
     g.uvs.clear();
     g.colours.clear();
-    g.validNormals = g.validUVs = g.validColours = false;
+    g.validNormals = g.validUVs = g.validColours = g.pointsPlaced = false;
     return true;
 }
 
@@ -172,6 +172,13 @@ bool TnFbxMesh::setValidColours(bool valid) {
 }
 
 bool TnFbxMesh::getValidColours() const { return mGeometry.validColours; }
+
+bool TnFbxMesh::setPointsPlaced(bool placed) {
+    mGeometry.pointsPlaced = placed;
+    return true;
+}
+
+bool TnFbxMesh::getPointsPlaced() const { return mGeometry.pointsPlaced; }
 
 int TnFbxMesh::getNumberOfPolygons() const { return lengthOf(mGeometry.polygonVertexSizes); }
 

@@ -131,4 +131,11 @@ bool TnFbxWriteInfo::setFidelity(EFbxFidelity fidelity) {
 
 EFbxFidelity TnFbxWriteInfo::getFidelity() const { return mOptions.fidelity; }
 
+bool TnFbxWriteInfo::setComputeCameraRotation(bool computeCameraRotation) {
+    mOptions.computeCameraRotation = computeCameraRotation;
+    return true;
+}
+
+bool TnFbxWriteInfo::getComputeCameraRotation() const { return mOptions.computeCameraRotation; }
+
 } // namespace Tarnell::Fbx

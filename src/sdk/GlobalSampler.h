@@ -5,7 +5,7 @@
 #pragma once
 
 #include "SampleAccount.h"
-#include "SampleRun.h"
+#include "access/SampleRun.h"
 
 #include "FbxSdk.h"
 

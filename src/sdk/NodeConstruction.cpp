@@ -1,9 +1,10 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Nodes with a new camera, light or null, and the two objects that surfaces are made of: textures and materials.
+// Nodes with a new camera, light, null or mesh, and the two objects that surfaces are made of: textures and materials.
 #include "FbxSdk.h"
 
+#include "access/MeshBuilding.h"
 #include "calls/LastError.h"
 
 namespace Tarnell::Fbx {
@@ -29,6 +30,15 @@ fbxsdk::FbxNode* nodeWith(fbxsdk::FbxNodeAttribute* attribute, Container* contai
     node->SetNodeAttribute(attribute);
     succeed();
     return node;
+}
+
+/// Null, or why there is nothing to make a mesh of.
+const char* faultOf(const TnFbxMesh& mesh) {
+    if (mesh.getNumberOfControlPoints() < 1 || mesh.getNumberOfPolygons() < 1 ||
+        mesh.getNumberOfPolygonVertices() < 1) {
+        return "the mesh has no geometry";
+    }
+    return detail::claimsTooManyCorners(mesh) ? "the polygons have more polygon vertices than the mesh" : nullptr;
 }
 
 } // namespace
@@ -81,6 +91,27 @@ fbxsdk::FbxNode* FbxSdk::createLight(fbxsdk::FbxScene* scene, TnFbxLight::EFbxLi
         light->CastLight.Set(true);
     }
     return nodeWith(light, scene, name);
+}
+
+fbxsdk::FbxNode* FbxSdk::createMesh(fbxsdk::FbxManager* manager, const TnFbxMesh* mesh, const std::string& name) {
+    if (manager == nullptr || mesh == nullptr) {
+        return none("no FBX manager or no mesh to make a mesh of");
+    }
+    if (const char* fault = faultOf(*mesh)) {
+        return none(fault);
+    }
+    fbxsdk::FbxMesh* target = fbxsdk::FbxMesh::Create(manager, name.c_str());
+    if (target == nullptr) {
+        return none("a mesh cannot be made");
+    }
+    if (!detail::buildMesh(*mesh, *target)) {
+        return none("a mesh without a layer cannot be filled");
+    }
+    fbxsdk::FbxNode* node = nodeWith(target, manager, name);
+    if (node != nullptr) {
+        node->SetShadingMode(fbxsdk::FbxNode::eTextureShading);
+    }
+    return node;
 }
 
 fbxsdk::FbxFileTexture* FbxSdk::createTexture(fbxsdk::FbxScene* scene, const std::string& fileName) {

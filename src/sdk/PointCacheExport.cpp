@@ -5,48 +5,28 @@
 // frame.
 #include "FbxSdk.h"
 
-#include "ObjectWarnings.h"
-#include "PointCachePlace.h"
+#include "access/ObjectWarnings.h"
+#include "access/PointCacheWriting.h"
 #include "calls/LastError.h"
-#include "model/FrameArithmetic.h"
 
 #include "TnFbxError.h"
 
-#include <cstdint>
 #include <filesystem>
 #include <iostream>
-#include <limits>
 #include <system_error>
-#include <vector>
 
 namespace Tarnell::Fbx {
 
 using detail::fail;
+using detail::pointCacheDeformerOf;
+using detail::pointCacheFault;
+using detail::pointCacheOf;
 using detail::succeed;
 
 namespace {
 
 using Cache = fbxsdk::FbxCache;
-using Paths = fbxsdk::FbxPathUtils;
 using Text = fbxsdk::FbxString;
-
-fbxsdk::FbxVertexCacheDeformer* deformerOf(fbxsdk::FbxNode& node) {
-    fbxsdk::FbxGeometry* geometry = node.GetGeometry();
-    return fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(
-        geometry != nullptr ? geometry->GetDeformer(0, fbxsdk::FbxDeformer::eVertexCache) : nullptr);
-}
-
-Cache* cacheOf(fbxsdk::FbxNode& node) {
-    fbxsdk::FbxVertexCacheDeformer* deformer = deformerOf(node);
-    return deformer != nullptr ? deformer->GetCache() : nullptr;
-}
-
-/// The platform gives such a cache its name when the scene is saved.
-void appearWithScene(Cache& cache) {
-    fbxsdk::FbxProperty property = fbxsdk::FbxProperty::Create(&cache, fbxsdk::FbxBoolDT, "AppearWithScene");
-    property.ModifyFlag(fbxsdk::FbxPropertyFlags::eNotSavable, true);
-    property.Set(true);
-}
 
 bool exists(const std::string& file) {
     std::error_code ignored;
@@ -64,60 +44,6 @@ std::string fileNameOf(const Cache& cache) {
     return std::string(absolute);
 }
 
-/// Null, or why the points of the mesh are not those of the range.
-const char* faultOf(const TnFbxMesh& mesh, const TnFbxTime& time) {
-    const std::int64_t points = mesh.getNumberOfControlPoints();
-    const std::int64_t frames = detail::frameCount(time.getStartFrame(), time.getEndFrame());
-    if (points < 1) {
-        return "the mesh has no control points";
-    }
-    if (frames < 1 || frames != mesh.getNumberOfControlPointSets()) {
-        return "the mesh has not one set of control points per frame";
-    }
-    return frames > std::numeric_limits<int>::max() / points ? "the mesh has too many control points" : nullptr;
-}
-
-bool openCache(Cache& cache, const char* channel, const TnFbxMesh& mesh, bool mayaFormat, bool useMcxFormat,
-               const TnFbxTime& time, fbxsdk::FbxStatus& status) {
-    const auto rate = static_cast<double>(time.getFrameRate());
-    if (mayaFormat) {
-        return cache.OpenFileForWrite(Cache::eMCOneFile, rate, channel, useMcxFormat ? Cache::eMCX : Cache::eMCC,
-                                      Cache::eDoubleVectorArray, "Points", &status);
-    }
-    return cache.OpenFileForWrite(static_cast<double>(time.getStartFrame()), rate,
-                                  static_cast<unsigned int>(mesh.getNumberOfControlPointSets()),
-                                  static_cast<unsigned int>(mesh.getNumberOfControlPoints()), &status);
-}
-
-/// The control points from `first` on, as many as the buffer has room for; points that there are not lie at the
-/// origin.
-void copyPoints(const TnFbxMesh& mesh, int first, std::vector<double>& buffer) {
-    for (std::size_t i = 0; i < buffer.size(); i += 3) {
-        float x = 0.0f, y = 0.0f, z = 0.0f;
-        mesh.getControlPoint(first + static_cast<int>(i / 3), x, y, z);
-        buffer[i] = static_cast<double>(x);
-        buffer[i + 1] = static_cast<double>(y);
-        buffer[i + 2] = static_cast<double>(z);
-    }
-}
-
-void writeSamples(Cache& cache, const char* channel, const TnFbxMesh& mesh, bool mayaFormat, const TnFbxTime& time) {
-    const int pointCount = mesh.getNumberOfControlPoints();
-    std::vector<double> buffer(static_cast<std::size_t>(pointCount) * 3);
-    const int channelIndex = cache.GetChannelIndex(channel);
-    for (int sample = 0; sample < mesh.getNumberOfControlPointSets(); ++sample) {
-        const int frame = time.getStartFrame() + sample;
-        copyPoints(mesh, sample * pointCount, buffer);
-        if (mayaFormat) {
-            fbxsdk::FbxTime sampleTime;
-            sampleTime.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(time.getFrameRate()));
-            cache.Write(channelIndex, sampleTime, buffer.data(), static_cast<unsigned int>(pointCount));
-        } else { // kept: the frame's own number, not the number of the sample
-            cache.Write(static_cast<unsigned int>(frame), buffer.data());
-        }
-    }
-}
-
 } // namespace
 
 bool FbxSdk::mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* meshNode, bool mayaFormat,
@@ -132,23 +58,7 @@ bool FbxSdk::mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* 
     const char* name = meshNode->GetName();
     const auto place = detail::pointCachePlace(
         fbxFileName, name, mayaFormat ? kMayaVertexCacheFileExtension : kMaxVertexCacheFileExtension);
-    if (!Paths::Create(place.folder)) {
-        return fail(std::string(place.folder) + ": the folder cannot be created");
-    }
-
-    Cache* cache = Cache::Create(manager, name);
-    cache->SetCacheFileName(place.relative, place.file);
-    cache->SetCacheFileFormat(mayaFormat ? Cache::eMayaCache : Cache::eMaxPointCacheV2);
-    if (mCachesAppearWithScene) {
-        appearWithScene(*cache);
-    }
-
-    auto* deformer = fbxsdk::FbxVertexCacheDeformer::Create(manager, name);
-    deformer->SetCache(cache);
-    deformer->Channel.Set(name);
-    deformer->Active.Set(true);
-    geometry->AddDeformer(deformer);
-    return succeed();
+    return detail::attachPointCache(*manager, *geometry, place, name, mayaFormat, mCachesAppearWithScene);
 }
 
 bool FbxSdk::animateVertexCacheOnMesh(fbxsdk::FbxNode* meshNode, const TnFbxMesh* mesh, bool mayaFormat,
@@ -156,19 +66,21 @@ bool FbxSdk::animateVertexCacheOnMesh(fbxsdk::FbxNode* meshNode, const TnFbxMesh
     if (meshNode == nullptr || mesh == nullptr) {
         return fail("no node or no mesh to write a point cache of");
     }
-    if (const char* fault = faultOf(*mesh, time)) {
+    if (const char* fault = pointCacheFault(*mesh, time)) {
         return fail(std::string(meshNode->GetName()) + ": " + fault);
     }
-    Cache* cache = cacheOf(*meshNode);
+    Cache* cache = pointCacheOf(*meshNode);
     if (cache == nullptr) {
         return fail(std::string(meshNode->GetName()) + ": the node has no vertex cache");
     }
+    const detail::PointCacheForm form = {meshNode->GetName(), mayaFormat, useMcxFormat,
+                                         static_cast<double>(time.getFrameRate())};
     fbxsdk::FbxStatus status;
-    if (!openCache(*cache, meshNode->GetName(), *mesh, mayaFormat, useMcxFormat, time, status)) {
+    if (!detail::openPointCache(*cache, *mesh, time, form, status)) {
         std::cout << "Error opening file for write: " << status.GetErrorString() << std::endl; // kept: hosts show it
         return fail(fileNameOf(*cache) + ": " + status.GetErrorString());
     }
-    writeSamples(*cache, meshNode->GetName(), *mesh, mayaFormat, time); // kept: only closing says whether it worked
+    detail::writePointSamples(*cache, *mesh, time, form); // kept: only closing says whether it worked
     return cache->CloseFile(&status) ? succeed() : fail(status.GetErrorString());
 }
 
@@ -183,16 +95,16 @@ void FbxSdk::addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const T
     if (animateVertexCacheOnMesh(&node, &mesh, maya, newest, time)) {
         return;
     }
-    Cache* cache = cacheOf(node);
+    Cache* cache = pointCacheOf(node);
     const bool isOldThere = cache != nullptr && exists(fileNameOf(*cache));
-    if (faultOf(mesh, time) != nullptr) { // kept: the deformer stays, and names a file that is not there
+    if (pointCacheFault(mesh, time) != nullptr) { // kept: the deformer stays, and names a file that is not there
         warnings.add(mesh.getName(), isOldThere ? kOldCache : kNoSets);
         return;
     }
     // Without the deformer: it would read an older cache, or none.
     detail::warn(mesh.getName() + ": is written without its animation: " + lastError() +
                  (isOldThere ? "; an older point cache is still there" : ""));
-    deformerOf(node)->Destroy();
+    pointCacheDeformerOf(node)->Destroy();
     if (cache != nullptr) {
         cache->Destroy();
     }

@@ -10,7 +10,7 @@
 #include "FrameTimes.h"
 #include "SampleAccount.h"
 #include "SampleRange.h"
-#include "SampleRun.h"
+#include "access/SampleRun.h"
 #include "access/TimeModeScope.h"
 
 #include "TnFbxCamera.h"

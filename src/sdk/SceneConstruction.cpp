@@ -5,8 +5,9 @@
 // object.
 #include "FbxSdk.h"
 
-#include "WriteChecks.h"
 #include "access/TimeModeScope.h"
+#include "access/WriteChecks.h"
+#include "access/WrittenSpan.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 #include "model/FrameArithmetic.h"
@@ -56,6 +57,13 @@ Time::EMode timeModeOf(float framesPerSecond) {
     return Time::eCustom;
 }
 
+/// The range to write; one that nobody set, and one that is none, says nothing about the span.
+bool saysSpan(const TnFbxWriteInfo& info) {
+    const float first = info.getStartFrame(), last = info.getEndFrame(), rate = info.getFPS();
+    const bool isDefault = first == TnFbxWriteInfo::kDefaultStartFrame && last == TnFbxWriteInfo::kDefaultEndFrame;
+    return !isDefault && first <= last && rate > 0.0f && std::isfinite(rate);
+}
+
 /// The range to write, at the rate to write it at.
 TnFbxTime timeOf(const TnFbxWriteInfo& info) {
     TnFbxTime time;
@@ -63,56 +71,6 @@ TnFbxTime timeOf(const TnFbxWriteInfo& info) {
                  detail::truncateToInt(info.getEndFrame()), info.getFPS());
     return time;
 }
-
-/// An order is in force where a node's rotation settings are active, which they are of cameras and of lights with a
-/// direction. Elsewhere every program turns in the order XYZ.
-void enforceRotationOrder(fbxsdk::FbxNode& node) {
-    fbxsdk::FbxEuler::EOrder order = fbxsdk::FbxEuler::eOrderXYZ;
-    node.GetRotationOrder(fbxsdk::FbxNode::eSourcePivot, order);
-    if (order != fbxsdk::FbxEuler::eOrderXYZ) {
-        node.SetRotationActive(true);
-    }
-}
-
-/// The span of time that a file states: that of its keys and of the range to write.
-class WrittenSpan {
-public:
-    void addKeys(fbxsdk::FbxNode& node, fbxsdk::FbxAnimStack* stack) {
-        mFound = node.GetAnimationInterval(mSpan, stack, /*pAnimLayerId*/ 0) || mFound;
-    }
-
-    /// A range that nobody set, and one that is none, widens nothing.
-    void addRange(const TnFbxWriteInfo& info) {
-        const float first = info.getStartFrame(), last = info.getEndFrame(), rate = info.getFPS();
-        const bool isDefault = first == TnFbxWriteInfo::kDefaultStartFrame && last == TnFbxWriteInfo::kDefaultEndFrame;
-        if (isDefault || !(first <= last) || !(rate > 0.0f) || !std::isfinite(rate)) {
-            return;
-        }
-        const TnFbxTime range = timeOf(info);
-        widen(range.getStartFrame(), rate);
-        widen(range.getEndFrame(), rate);
-    }
-
-    void store(fbxsdk::FbxScene& scene, fbxsdk::FbxAnimStack* stack) {
-        if (mFound && stack != nullptr) {
-            stack->SetLocalTimeSpan(mSpan);
-            stack->SetReferenceTimeSpan(mSpan);
-            scene.GetGlobalSettings().SetTimelineDefaultTimeSpan(mSpan);
-        }
-    }
-
-private:
-    void widen(int frame, float framesPerSecond) {
-        Time time;
-        time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(framesPerSecond));
-        mSpan.SetStart(std::min(mSpan.GetStart(), time));
-        mSpan.SetStop(std::max(mSpan.GetStop(), time));
-        mFound = true;
-    }
-
-    fbxsdk::FbxTimeSpan mSpan{FBXSDK_TIME_INFINITE, FBXSDK_TIME_MINUS_INFINITE};
-    bool mFound = false;
-};
 
 /// The keys of one scene, held against `memoryLimit()`.
 class KeyScope {
@@ -138,7 +96,7 @@ public:
             fbxsdk::FbxNode* node = object != nullptr ? makeNode(*object) : nullptr;
             if (node != nullptr) {
                 mRoot.AddChild(node);
-                enforceRotationOrder(*node);
+                detail::enforceRotationOrder(*node);
                 mSpan.addKeys(*node, mStack);
                 detail::check(*object, warnings);
             } else if (object != nullptr) {
@@ -156,7 +114,12 @@ public:
 
     /// States the span of time, and says what was noticed.
     void finish(const TnFbxWriteInfo& info, fbxsdk::FbxScene& scene) {
-        mSpan.addRange(info);
+        if (saysSpan(info)) {
+            const TnFbxTime range = timeOf(info);
+            const auto rate = static_cast<double>(range.getFrameRate());
+            mSpan.add(static_cast<double>(range.getStartFrame()) / rate);
+            mSpan.add(static_cast<double>(range.getEndFrame()) / rate);
+        }
         mSpan.store(scene, mStack);
         detail::warnAboutRate(info.getFPS(), timeModeOf(info.getFPS()) == Time::eCustom);
         warnings.report();
@@ -167,7 +130,7 @@ public:
 private:
     fbxsdk::FbxNode& mRoot;
     fbxsdk::FbxAnimStack* mStack;
-    WrittenSpan mSpan;
+    detail::WrittenSpan mSpan;
     std::set<std::string> mCached; // names of meshes
 };
 

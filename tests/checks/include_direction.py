@@ -21,13 +21,13 @@ PLATFORM = re.compile(
     r'^[<"](?:.*/)?(?:fbxsdk\.h|fbxsdk/.*|(?:core|container|schema|document|object|animation|scene|cache|geometry|conversion|io)/.*)[>"]$'
 )
 # What belongs to the library: its public headers and its own folders.
-LIBRARY = re.compile(r'^[<"](?:.*/)?(?:Tn\w+\.h|Fbx\.h|FbxSdk\.h|(?:model|access|sdk|faithful)/.*)[>"]$')
+LIBRARY = re.compile(r'^[<"](?:.*/)?(?:Tn\w+\.h|Fbx\.h|FbxSdk\.h|FbxFaithful\.h|(?:model|access|sdk|faithful)/.*)[>"]$')
 # The layers above the value classes.
-ABOVE_MODEL = re.compile(r'^[<"](?:.*/)?(?:Fbx\.h|FbxSdk\.h|TnFbxError\.h|(?:access|sdk|faithful)/.*)[>"]$')
+ABOVE_MODEL = re.compile(r'^[<"](?:.*/)?(?:Fbx\.h|FbxSdk\.h|FbxFaithful\.h|TnFbxError\.h|(?:access|sdk|faithful)/.*)[>"]$')
 # The two adapters.
 COMPATIBLE = re.compile(r'^[<"](?:.*/)?(?:FbxSdk\.h|sdk/.*)[>"]$')
-FAITHFUL = re.compile(r'^[<"](?:.*/)?faithful/.*[>"]$')
-EITHER = re.compile(r'^[<"](?:.*/)?(?:FbxSdk\.h|(?:sdk|faithful)/.*)[>"]$')
+FAITHFUL = re.compile(r'^[<"](?:.*/)?(?:FbxFaithful\.h|faithful/.*)[>"]$')
+EITHER = re.compile(r'^[<"](?:.*/)?(?:FbxSdk\.h|FbxFaithful\.h|(?:sdk|faithful)/.*)[>"]$')
 
 
 class Rule(NamedTuple):

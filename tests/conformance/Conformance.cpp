@@ -4,6 +4,7 @@
 // Reads every file of the corpus, compares it with its reference and prints a table. Fails when a row agrees less than
 // expected.json says, or when the files that differ are not those listed there. With --through every file is written
 // anew as well, and its copies must agree with the reference as well as the file itself does.
+#include "Converting.h"
 #include "Corpus.h"
 #include "Expectations.h"
 #include "FaithfulRows.h"
@@ -29,15 +30,17 @@ constexpr std::size_t kAllDifferences = 1000;
 
 constexpr const char* kUsageText =
     "usage: conformance [--faithful] [--file NAME] [--update] [--quiet] [--through VERSION:ENCODING]…\n"
+    "                   [--converted YEAR:ENCODING]…\n"
     "  --faithful   the second table: what a host sees that asks for what the application shows\n"
     "  --file NAME  all differences of one file\n"
     "  --update     write the numbers of this run to expected.json, or faithful.json\n"
     "  --quiet      the table and the violations only\n"
-    "  --through    check copies, written for example as FBX201400:binary; once for each form\n";
+    "  --through    check copies, written for example as FBX201400:binary; once for each form\n"
+    "  --converted  check what the tool's convert makes of the files, for example of 2014:ascii; once for each form\n";
 
 struct Options {
     std::string file;
-    std::vector<std::string> through;
+    std::vector<std::string> through, converted;
     bool update = false;
     bool quiet = false;
     bool faithful = false;
@@ -57,6 +60,8 @@ bool parse(int argc, char** argv, Options& options) {
             options.file = argv[++i];
         else if (std::strcmp(argv[i], "--through") == 0 && i + 1 < argc && parseWrittenForm(argv[i + 1]))
             options.through.emplace_back(argv[++i]);
+        else if (std::strcmp(argv[i], "--converted") == 0 && i + 1 < argc && parseConvertedForm(argv[i + 1]))
+            options.converted.emplace_back(argv[++i]);
         else
             return false;
     }
@@ -184,6 +189,16 @@ void checkCopies(const CorpusFile& file, const Options& options,
     }
 }
 
+/// Prints how the copies of one form compare; whether that fails the run.
+bool judgeRoundTrip(const RoundTrip& comparison, const Options& options) {
+    comparison.print();
+    const std::vector<std::string> violations =
+        options.file.empty() ? comparison.violations() : std::vector<std::string>();
+    for (const std::string& violation : violations)
+        std::printf("FAILED %s\n", violation.c_str());
+    return !violations.empty();
+}
+
 /// Checks the copies of all files, in every form, against the files.
 int runThrough(const Options& options, const std::filesystem::path& corpus) {
     std::vector<std::unique_ptr<CopiedCorpus>> forms;
@@ -194,14 +209,69 @@ int runThrough(const Options& options, const std::filesystem::path& corpus) {
             checkCopies(file, options, forms);
     }
     bool failed = false;
-    for (const std::unique_ptr<CopiedCorpus>& form : forms) {
-        form->comparison.print();
-        const std::vector<std::string> violations =
-            options.file.empty() ? form->comparison.violations() : std::vector<std::string>();
-        for (const std::string& violation : violations)
-            std::printf("FAILED %s\n", violation.c_str());
-        failed = failed || !violations.empty();
+    for (const std::unique_ptr<CopiedCorpus>& form : forms)
+        failed = judgeRoundTrip(form->comparison, options) || failed;
+    return failed ? 1 : 0;
+}
+
+// ---- Through convert ----
+
+/// The converted files of one form, and how they compare.
+struct ConvertedForms {
+    ConvertedCorpus files;
+    RoundTrip comparison;
+
+    explicit ConvertedForms(const std::string& form)
+        : files(*parseConvertedForm(form)), comparison(TARNELL_CONFORMANCE_REWRITTEN, "convert " + form) {}
+};
+
+void checkConvertible(LoadedFile& loaded, const CorpusFile& file, const Options& options, Results& results) {
+    for (const Row& row : faithfulRows()) {
+        if (!survivesConversion(row))
+            continue;
+        Findings findings(options.file.empty() ? kDifferencesPerFile : kAllDifferences);
+        row.check(loaded, findings);
+        record(row, file, findings, results);
+        if (!options.quiet)
+            printDifferences(row, file, findings);
     }
+}
+
+/// Checks what becomes of one file against the file itself.
+void checkConversions(const CorpusFile& file, const Options& options,
+                      const std::vector<std::unique_ptr<ConvertedForms>>& forms) {
+    if (!file.reference)
+        return;
+    const Reference reference = readReference(*file.reference);
+    if (!reference.loads || isLongClip(reference))
+        return; // nothing to convert, and clips of days
+    Options silent = options;
+    silent.quiet = true;
+    Results before;
+    LoadedFile loaded(file, reference);
+    loaded.compareWholeFrames();
+    const FlatPlaces places = flatPlacesOf(loaded);
+    checkConvertible(loaded, file, silent, before);
+    for (const std::unique_ptr<ConvertedForms>& form : forms) {
+        const CorpusFile copy = form->files.convert(file, reference, deforms(file));
+        LoadedFile converted(copy, reference, places);
+        Results after;
+        checkConvertible(converted, copy, options, after);
+        form->comparison.add(file.name, before, after);
+    }
+}
+
+int runConverted(const Options& options, const std::filesystem::path& corpus) {
+    std::vector<std::unique_ptr<ConvertedForms>> forms;
+    for (const std::string& form : options.converted)
+        forms.push_back(std::make_unique<ConvertedForms>(form));
+    for (const CorpusFile& file : listCorpus(corpus)) {
+        if (options.file.empty() || file.name == options.file)
+            checkConversions(file, options, forms);
+    }
+    bool failed = false;
+    for (const std::unique_ptr<ConvertedForms>& form : forms)
+        failed = judgeRoundTrip(form->comparison, options) || failed;
     return failed ? 1 : 0;
 }
 
@@ -213,6 +283,8 @@ int run(const Options& options) {
     }
     if (!options.through.empty())
         return runThrough(options, *corpus);
+    if (!options.converted.empty())
+        return runConverted(options, *corpus);
     const auto start = std::chrono::steady_clock::now();
     Results results;
     int files = 0;

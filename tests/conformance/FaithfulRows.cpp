@@ -262,6 +262,8 @@ void forEachMesh(LoadedFile& file, Findings& findings, const Check& check) {
     const std::vector<FaithfulNode> faithful = readFaithfulReference(faithfulReferenceOf(file));
     const auto nodes = matchNodes(file.reference(), faithful);
     for (std::size_t f = 0; f < file.reference().frames.size(); ++f) {
+        if (!file.compares(f))
+            continue;
         const auto list =
             read<TnFbxMesh>(file, infoOf(file, file.reference().frames[f]), &Fbx::getMeshes, isMesh, findings);
         for (const auto& [index, mesh] : list.ofNode) {
@@ -311,6 +313,8 @@ void checkFaithfulLoads(LoadedFile& file, Findings& findings) {
 void checkFaithfulTransforms(LoadedFile& file, Findings& findings) {
     const Reference& reference = file.reference();
     for (std::size_t f = 0; f < reference.frames.size(); ++f) {
+        if (!file.compares(f))
+            continue;
         const auto list =
             read<TnFbxTransform>(file, infoOf(file, reference.frames[f]), &Fbx::getTransforms, isAny, findings);
         for (const auto& [index, object] : list.ofNode) {
@@ -325,6 +329,8 @@ void checkFaithfulTransforms(LoadedFile& file, Findings& findings) {
 void checkFaithfulLocals(LoadedFile& file, Findings& findings) {
     const Reference& reference = file.reference();
     for (std::size_t f = 0; f < reference.frames.size(); ++f) {
+        if (!file.compares(f))
+            continue;
         TnFbxReadInfo info = infoOf(file, reference.frames[f]);
         info.setGlobalTransform(false);
         const auto list = read<TnFbxTransform>(file, info, &Fbx::getTransforms, isAny, findings);
@@ -348,6 +354,8 @@ void checkFaithfulSamples(LoadedFile& file, Findings& findings) {
         const ReferenceNode& node = reference.nodes[index];
         const TnFbxTransform& transform = *object;
         for (std::size_t f = 0; f < reference.frames.size(); ++f) {
+            if (!file.compares(f))
+                continue;
             const double frame = reference.frames[f];
             bool inRange = frame == std::floor(frame);
             for (int i = 0; i <= TnFbxTransform::kFbxTransformSkewZ; ++i) {
@@ -375,6 +383,8 @@ void checkFaithfulCurves(LoadedFile& file, Findings& findings) {
                                                     "Lcl Rotation X",    "Lcl Rotation Y",    "Lcl Rotation Z",
                                                     "Lcl Scaling X",     "Lcl Scaling Y",     "Lcl Scaling Z"};
     for (std::size_t f = 0; f < reference.frames.size(); ++f) {
+        if (!file.compares(f))
+            continue;
         TnFbxReadInfo info = infoOf(file, reference.frames[f]);
         info.setGlobalTransform(false);
         const auto list = read<TnFbxTransform>(file, info, &Fbx::getTransforms, isAny, findings);
@@ -408,6 +418,8 @@ void checkFaithfulCameras(LoadedFile& file, Findings& findings) {
     const Reference& reference = file.reference();
     const FbxAMatrix turn = turnAbout(1, -90.0);
     for (std::size_t f = 0; f < reference.frames.size(); ++f) {
+        if (!file.compares(f))
+            continue;
         const auto list =
             read<TnFbxCamera>(file, infoOf(file, reference.frames[f]), &Fbx::getCameras, isCamera, findings);
         for (const auto& [index, camera] : list.ofNode) {
@@ -425,6 +437,8 @@ void checkFaithfulLights(LoadedFile& file, Findings& findings) {
     const Reference& reference = file.reference();
     const FbxAMatrix turn = turnAbout(0, -90.0);
     for (std::size_t f = 0; f < reference.frames.size(); ++f) {
+        if (!file.compares(f))
+            continue;
         const auto list = read<TnFbxLight>(file, infoOf(file, reference.frames[f]), &Fbx::getLights, isLight, findings);
         for (const auto& [index, light] : list.ofNode) {
             const ReferenceNode& node = reference.nodes[index];
@@ -440,6 +454,8 @@ void checkFaithfulLenses(LoadedFile& file, Findings& findings) {
     const std::vector<FaithfulNode> faithful = readFaithfulReference(faithfulReferenceOf(file));
     const auto nodes = matchNodes(reference, faithful);
     for (std::size_t f = 0; f < reference.frames.size(); ++f) {
+        if (!file.compares(f))
+            continue;
         const auto list =
             read<TnFbxCamera>(file, infoOf(file, reference.frames[f]), &Fbx::getCameras, isCamera, findings);
         for (const auto& [index, camera] : list.ofNode) {
@@ -526,6 +542,8 @@ void checkFaithfulNormals(LoadedFile& file, Findings& findings) {
 void checkFaithfulWavefront(LoadedFile& file, Findings& findings) {
     for (const WavefrontSibling& sibling : file.file().wavefront) {
         const double frame = secondsOf(sibling, file.reference()) * file.reference().fps;
+        if (!file.comparesFrame(frame))
+            continue;
         const auto list = read<TnFbxMesh>(file, infoOf(file, frame), &Fbx::getMeshes, isMesh, findings);
         const PointSource pointsOf = [&](std::size_t nodeIndex) {
             std::vector<Point> points;
@@ -557,5 +575,15 @@ std::span<const Row> faithfulRows() {
     };
     return kRows;
 }
+
+bool survivesConversion(const Row& row) { return row.check != checkFaithfulLocals && row.check != checkFaithfulCurves; }
+
+bool deforms(const CorpusFile& file) {
+    const std::vector<FaithfulNode> nodes =
+        readFaithfulReference(file.reference->parent_path().parent_path() / "refs-faithful" / (file.name + ".json"));
+    return std::any_of(nodes.begin(), nodes.end(), [](const FaithfulNode& node) { return node.deformed; });
+}
+
+bool isLongClip(const Reference& reference) { return slownessOf(reference) > 1.0; }
 
 } // namespace conformance

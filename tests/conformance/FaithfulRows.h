@@ -12,6 +12,12 @@
 namespace conformance {
 
 std::span<const Row> faithfulRows();
+/// Whether the row holds of converted files, too, in which every node stands below the root and has a key per frame.
+bool survivesConversion(const Row& row);
+/// Whether the file has meshes that skins, blend shapes or caches deform.
+bool deforms(const CorpusFile& file);
+/// Clips that last for days.
+bool isLongClip(const Reference& reference);
 
 void checkFaithfulLoads(LoadedFile& file, Findings& findings);
 void checkFaithfulTransforms(LoadedFile& file, Findings& findings);

@@ -6,6 +6,8 @@
 
 #include "Utf8.h"
 
+#include <array>
+#include <cmath>
 #include <map>
 #include <span>
 
@@ -113,6 +115,13 @@ LoadedFile::LoadedFile(const CorpusFile& file, const Reference& reference) : mFi
     matchReference();
 }
 
+LoadedFile::LoadedFile(const CorpusFile& file, const Reference& reference, const FlatPlaces& places)
+    : LoadedFile(file, reference) {
+    mWholeFrames = true;
+    if (mLoaded)
+        matchPlaces(places);
+}
+
 LoadedFile::~LoadedFile() { mSdk.destroySdkObjects(&mManager); }
 
 FbxAnimStack* LoadedFile::firstStack() const {
@@ -215,6 +224,46 @@ void LoadedFile::matchReference() {
         }
     }
 }
+
+void LoadedFile::matchPlaces(const FlatPlaces& places) {
+    std::array<std::vector<const SceneNode*>, kFlatGroups> groups;
+    for (const SceneNode& entry : mNodes) {
+        const bool skews = entry.node->GetChildCount() > 0; // stands above a node for the skew of that
+        if (!skews)
+            groups[static_cast<std::size_t>(flatGroupOf(*entry.node, /*converted*/ true))].push_back(&entry);
+    }
+    for (std::size_t i = 0; i < mNodeOfReference.size(); ++i) {
+        mNodeOfReference[i] = nullptr;
+        if (!places[i])
+            continue;
+        const auto& group = groups[static_cast<std::size_t>(places[i]->group)];
+        const auto index = static_cast<std::size_t>(places[i]->index);
+        mNodeOfReference[i] = index < group.size() ? group[index] : nullptr;
+    }
+}
+
+FlatGroup flatGroupOf(const FbxNode& node, bool converted) {
+    const FbxNodeAttribute* attribute = node.GetNodeAttribute();
+    if (attribute == nullptr)
+        return converted ? FlatGroup::transforms : FlatGroup::nulls;
+    switch (attribute->GetAttributeType()) {
+    case FbxNodeAttribute::eCamera:
+    case FbxNodeAttribute::eCameraStereo:
+        return FlatGroup::cameras;
+    case FbxNodeAttribute::eLight:
+        return FlatGroup::lights;
+    case FbxNodeAttribute::eNull:
+        return FlatGroup::nulls;
+    case FbxNodeAttribute::eMesh:
+    case FbxNodeAttribute::eNurbs:
+    case FbxNodeAttribute::ePatch:
+        return FlatGroup::meshes;
+    default:
+        return FlatGroup::transforms;
+    }
+}
+
+bool isWholeFrame(double frame) { return frame == std::floor(frame); }
 
 bool LoadedFile::besideTree(std::size_t index) const {
     const SceneNode* node = mNodeOfReference[index];

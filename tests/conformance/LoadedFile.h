@@ -10,6 +10,7 @@
 
 #include <FbxSdk.h>
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -25,9 +26,26 @@ struct SceneNode {
     bool conversionMoves = false; ///< the conversion changes the node's own local values
 };
 
+/// Converted files have all nodes below the root, kind by kind, each kind in its order.
+enum class FlatGroup { cameras, lights, transforms, nulls, meshes };
+constexpr std::size_t kFlatGroups = 5;
+struct FlatPlace {
+    FlatGroup group;
+    int index;
+};
+/// By the index in the reference; nothing for what is not converted.
+using FlatPlaces = std::vector<std::optional<FlatPlace>>;
+
+/// Of a node of a file, or of one that was converted.
+FlatGroup flatGroupOf(const fbxsdk::FbxNode& node, bool converted);
+
+bool isWholeFrame(double frame);
+
 class LoadedFile {
 public:
     LoadedFile(const CorpusFile& file, const Reference& reference);
+    /// A converted file.
+    LoadedFile(const CorpusFile& file, const Reference& reference, const FlatPlaces& places);
     ~LoadedFile();
     LoadedFile(const LoadedFile&) = delete;
     LoadedFile& operator=(const LoadedFile&) = delete;
@@ -43,6 +61,11 @@ public:
     [[nodiscard]] const std::vector<SceneNode>& nodes() const { return mNodes; }
     /// The node that the reference has at `index`; null when this scene has none like it.
     [[nodiscard]] const SceneNode* nodeOf(std::size_t index) const { return mNodeOfReference[index]; }
+    /// Compares whole frames only: converted files have keys there.
+    void compareWholeFrames() { mWholeFrames = true; }
+    [[nodiscard]] bool compares(std::size_t frameIndex) const { return comparesFrame(mReference.frames[frameIndex]); }
+    [[nodiscard]] bool comparesFrame(double frame) const { return !mWholeFrames || isWholeFrame(frame); }
+
     /// Whether the reference's node is one of the producer cameras, which this scene keeps beside the tree.
     [[nodiscard]] bool besideTree(std::size_t index) const;
 
@@ -56,6 +79,7 @@ private:
     void markMovedNodes();
     void normalise();
     void matchReference();
+    void matchPlaces(const FlatPlaces& places);
 
     const CorpusFile& mFile;
     const Reference& mReference;
@@ -63,6 +87,7 @@ private:
     fbxsdk::FbxManager* mManager = nullptr;
     fbxsdk::FbxScene* mScene = nullptr;
     bool mLoaded = false;
+    bool mWholeFrames = false;
     std::vector<SceneNode> mNodes;
     std::vector<SceneNode> mProducers;
     std::vector<const SceneNode*> mNodeOfReference;

@@ -184,13 +184,13 @@ TEST(FaithfulReading, FailsBeyondTheMemoryLimitAndSaysWhatWasNeeded) {
     scene.key(scene.addNode("mover")->LclTranslation, "X", {{0, 0.0f}, {100'000, 1.0f}});
     const SavedScene saved(scene);
     TnFbxReadInfo info = saved.info();
-    setMemoryLimit(1 << 20);
+    setMemoryLimit(1 << 18); // the one channel that changes takes more
     TnFbxNull* nulls = nullptr;
     int count = 0;
     EXPECT_FALSE(Fbx().getNulls(info, &nulls, count));
     setMemoryLimit(0);
     delete[] nulls;
-    EXPECT_THAT(lastError(), testing::HasSubstr("4.6 MiB"));
+    EXPECT_THAT(lastError(), testing::HasSubstr("391.6 KiB"));
 }
 
 TEST(FaithfulReading, FailsForMoreFramesThanAChannelHolds) {

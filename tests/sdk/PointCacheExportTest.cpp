@@ -7,7 +7,7 @@
 
 #include "Fbx.h"
 #include "TnFbxError.h"
-#include "sdk/PointCachePlace.h"
+#include "access/PointCachePlace.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Names of nodes as names of files: plain ones as they are, all others in a form that every system can hold.
-#include "sdk/PointCacheName.h"
+#include "access/PointCacheName.h"
 
 #include "support/TemporaryFolder.h"
 #include "support/WritingBuilders.h"

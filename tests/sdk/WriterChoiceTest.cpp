@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The choice among more writers than the platform brings along.
-#include "sdk/WriterChoice.h"
+#include "access/WriterChoice.h"
 
 #include <gtest/gtest.h>
 

@@ -5,11 +5,12 @@
 import math
 import os
 import struct
+import subprocess
 import sys
 import tempfile
 import unittest
 
-from support import NO_FRAMES, ROOT, SHOT, dump, edited, named, run
+from support import NO_FRAMES, ROOT, SDK_DATA, SHOT, TOOL, dump, edited, named, run
 
 MOVING = os.path.join(ROOT, "tests", "data", "tool", "moving_triangle.fbx")
 SKINNED = os.path.join(ROOT, "tests", "data", "blender", "skin_7400_binary.fbx")
@@ -40,6 +41,18 @@ def rotation(order, angles):
         turn[i][i], turn[i][j], turn[j][i], turn[j][j] = c, -s, s, c
         matrix = [[sum(turn[a][k] * matrix[k][b] for k in range(3)) for b in range(3)] for a in range(3)]
     return matrix
+
+
+def changed(source, path, *replacements):
+    """Writes a copy of a text file in which each (old, new) was replaced."""
+    with open(source, encoding="utf-8") as stream:
+        text = stream.read()
+    for old, new in replacements:
+        assert text.count(old) == 1, f"{source} has {text.count(old)} times: {old}"
+        text = text.replace(old, new)
+    with open(path, "w", encoding="utf-8") as stream:
+        stream.write(text)
+    return path
 
 
 class Convert(unittest.TestCase):
@@ -188,10 +201,15 @@ class Convert(unittest.TestCase):
         self.convert("--frames", "1003:1003", "--cache", "none", source=turned)
         self.assertEqual(self.points(self.out)[0][2], [4, 0, 7, 5, 0, 7, 4, 1, 7])
 
-    def test_without_caches_points_stand_as_at_the_first_frame(self):
+    def test_a_mesh_moves_with_its_node_without_caches(self):
         self.convert("--frames", "1003:1006", "--cache", "none", source=MOVING)
         self.assertFalse(os.path.exists(self.out[:-4] + "_fpc"))
-        self.assertEqual([points for _, _, points in self.points(self.out)], [[4, 0, 0, 5, 0, 0, 4, 1, 0]] * 4)
+        self.assertEqual(self.points(self.out), self.points(MOVING))
+
+    def test_without_caches_deformed_points_stand_as_at_the_first_frame(self):
+        self.convert("--frames", "1003:1005", "--cache", "none", source=SKINNED)
+        first, *others = [points for _, _, points in self.points(self.out)]
+        self.assertEqual(others, [first] * 3)
 
     def test_frames_are_counted_at_the_new_rate(self):
         self.convert("--frames", "2004:2008", "--fps", "48", source=MOVING)
@@ -213,12 +231,134 @@ class Convert(unittest.TestCase):
         self.assertAlmostEqual(lens["samples"][1], (old[0] + old[1]) / 2, places=4)
 
     def test_what_is_lost_is_said(self):
-        self.assertIn("moving meshes: 1\n", self.convert(source=MOVING).stderr)
-        self.assertEqual(self.convert("--force", "--frames", "1001:1011", source=MOVING).stderr, "")
-        self.assertIn("look-at points, up vectors and rolls of cameras: 1\n", self.convert("--force").stderr)
+        self.assertIn("moving meshes: 1\n", self.convert(source=SKINNED).stderr)
+        self.assertNotIn("moving meshes", self.convert("--force", "--frames", "1001:1011", source=SKINNED).stderr)
+        self.assertEqual(self.convert("--force", source=MOVING).stderr, "")
+        self.assertIn("gate fits of cameras: 1\n", self.convert("--force").stderr)
+
+    def test_strict_makes_losses_the_exit_status(self):
+        self.assertEqual(run("convert", "--strict", MOVING, self.out).returncode, 0)
+        result = run("convert", "--strict", "--force", SKINNED, self.out)
+        self.assertEqual(result.returncode, 3)
+        self.assertIn("not written: skins: 1\n", result.stderr)
+        self.assertEqual(version_of(self.out), ("binary", 7500))
 
     def source(self, fixture, *replacements):
         return edited(fixture, os.path.join(self.folder.name, "source.fbx"), *replacements)
+
+    def faithful(self, path, *arguments):
+        return dump("--faithful", *arguments, path)
+
+    def assertSameTransform(self, expected, seen, places=4):
+        self.assertEqual(expected["rotationOrder"], seen["rotationOrder"])
+        for name, channel in expected["transform"].items():
+            self.assertSameChannel(channel, seen["transform"][name], f"{expected['name']} {name}", places)
+
+    def test_everything_stands_where_it_stood(self):
+        for source in (SHOT, MOVING, SKINNED):
+            self.convert("--force", source=source)
+            before, after = self.faithful(source), self.faithful(self.out)
+            self.assertEqual(len(before["transforms"]), len(after["transforms"]))
+            for kind in ("cameras", "lights", "nulls", "transforms", "meshes"):
+                for item in before[kind]:
+                    self.assertSameTransform(item, named(after[kind], item["name"]))
+
+    def test_the_stack_keeps_its_name(self):
+        source = changed(MOVING, os.path.join(self.folder.name, "named.fbx"),
+                         ("AnimStack::Take 001", "AnimStack::shot 010 | comp"))
+        for arguments in ([], ["--version", "2010"]):
+            self.convert("--force", *arguments, source=source)
+            self.assertEqual(dump(self.out)["stacks"], ["shot 010 | comp"])
+
+    def test_a_lens_with_an_angle_keeps_it(self):
+        for mode, angle in (("horizontal", "filedOfView"), ("vertical", "filedOfView"),
+                            ("horizontalAndVertical", "filedOfViewX")):
+            number = ["horizontalAndVertical", "horizontal", "vertical"].index(mode)
+            source = changed(os.path.join(SDK_DATA, "camera_7400_ascii.fbx"), os.path.join(self.folder.name, "lens.fbx"),
+                             ('P: "ApertureMode", "enum", "", "",3',
+                              f'P: "ApertureMode", "enum", "", "",{number}\n'
+                              'P: "FieldOfView", "FieldOfView", "", "A",31\n'
+                              'P: "FieldOfViewX", "FieldOfViewX", "", "A",33\nP: "FieldOfViewY", "FieldOfViewY", "", "A",22'))
+            before = self.faithful(source, "--kind", "cameras")["cameras"][0]
+            for arguments in ([], ["--version", "2014", "--ascii"], ["--version", "2010"]):
+                self.convert("--force", *arguments, source=source)
+                after = self.faithful(self.out, "--kind", "cameras")["cameras"][0]
+                self.assertEqual(after["apertureMode"], mode)
+                for channel in ("focalLength", "apertureWidth", "apertureHeight", angle):
+                    self.assertSameChannel(before["channels"][channel], after["channels"][channel], channel)
+
+    def test_a_mirrored_mesh_keeps_its_normals(self):
+        source = changed(os.path.join(SDK_DATA, "mesh_7400_ascii.fbx"), os.path.join(self.folder.name, "mirrored.fbx"), ('"Mesh" {\n\t\tVersion: 232\n',
+                                                     '"Mesh" {\n\t\tVersion: 232\n\t\tProperties70:  {\n\t\t\tP: '
+                                                     '"Lcl Scaling", "Lcl Scaling", "", "A",-2,1,1\n\t\t}\n'))
+        self.convert(source=source)
+        before, after = (self.faithful(path, "--kind", "meshes")["meshes"][0] for path in (source, self.out))
+        for key in ("pointIndices", "polygonVertexSizes"):
+            self.assertEqual(before[key], after[key])
+        for key in ("normals", "controlPoints"):
+            self.assertEqual(len(before[key]), len(after[key]))
+            for a, b in zip(before[key], after[key]):
+                self.assertAlmostEqual(a, b, places=4, msg=key)
+
+    def test_rates_come_back(self):
+        for rate, exact in (("59.94", 60000 / 1001), ("12", 12), ("29.97", 30000 / 1001), ("23.976", 24000 / 1001),
+                            ("15.5", 15.5)):
+            for arguments in ([], ["--version", "2010"], ["--ascii"]):
+                self.convert("--force", "--fps", rate, *arguments)
+                lens = named(self.faithful(self.out, "--kind", "cameras")["cameras"], "shotCam")["channels"]
+                self.assertAlmostEqual(lens["focalLength"]["rate"], exact, places=3)
+
+    def test_a_spinning_node_at_the_origin_spins(self):
+        source = changed(MOVING, os.path.join(self.folder.name, "spin.fbx"), ('"Lcl Translation"', '"Lcl Rotation"'),
+                         ('105,104, "d|X"', '105,104, "d|Z"'))
+        self.convert(source=source)
+        angles = named(self.faithful(self.out)["transforms"], "moving")["transform"]["rotationZ"]
+        self.assertEqual(len(set(samples(angles))), len(samples(angles)))
+
+    def test_other_extensions_are_refused(self):
+        for name in ("out.obj", "out.FBX.txt", "out.fbx.bak", ".obj"):
+            target = os.path.join(self.folder.name, name)
+            result = run("convert", SHOT, target)
+            self.assertEqual(result.returncode, 2, name)
+            self.assertIn(".fbx", result.stderr)
+            self.assertFalse(os.path.exists(target))
+        self.assertEqual(run("convert", SHOT, os.path.join(self.folder.name, "out.FBX")).returncode, 0)
+
+    def test_a_dash_is_standard_output(self):
+        self.convert("--ascii")
+        seen = run("convert", "--ascii", SHOT, "-", env={**os.environ, "SOURCE_DATE_EPOCH": "0"})
+        again = run("convert", "--ascii", SHOT, "-", env={**os.environ, "SOURCE_DATE_EPOCH": "0"})
+        self.assertEqual(seen.returncode, 0, seen.stderr)
+        self.assertTrue(seen.stdout.startswith("; FBX 7.5.0 project file"))
+        self.assertEqual(seen.stdout, again.stdout)
+        self.assertFalse(os.path.exists("-"))
+        refused = run("convert", "--frames", "1001:1003", SHOT, "-")
+        self.assertEqual((refused.returncode, refused.stdout), (2, ""))
+        self.assertIn("--cache none", refused.stderr)
+
+    def test_standard_output_that_is_full_is_a_failure(self):
+        with open("/dev/full", "wb") as full:
+            result = subprocess.run([TOOL, "convert", SHOT, "-"], stdout=full, stderr=subprocess.PIPE, check=False)
+        self.assertEqual(result.returncode, 1)
+
+    def twins(self):
+        """The moving triangle beside another one of its name, which stands still 7 higher."""
+        return changed(MOVING, os.path.join(self.folder.name, "twins.fbx"), (
+            '\tAnimationStack: 102',
+            '\tGeometry: 200, "Geometry::", "Mesh" {\n\t\tVertices: *9 {\n\t\t\ta: 0,7,0,1,7,0,0,8,0\n\t\t}\n'
+            '\t\tPolygonVertexIndex: *3 {\n\t\t\ta: 0,1,-3\n\t\t}\n\t}\n'
+            '\tModel: 201, "Model::moving", "Mesh" {\n\t\tVersion: 232\n\t}\n\tAnimationStack: 102'),
+            ('\tC: "OO",101,0\n', '\tC: "OO",101,0\n\tC: "OO",201,0\n\tC: "OO",200,201\n\tC: "OP",104,201, '
+                                  '"Lcl Translation"\n'))
+
+    def test_meshes_of_one_name_have_their_own_caches(self):
+        source = self.twins()
+        self.convert("--frames", "1003:1006", source=source)
+        self.assertEqual(len(os.listdir(self.out[:-4] + "_fpc")), 4)
+        before, after = ([(mesh["frame"], mesh["controlPoints"])
+                          for mesh in self.faithful(path, "--kind", "meshes", "--frames", "1003:1006")["meshes"]]
+                         for path in (source, self.out))
+        self.assertEqual(before, after)
 
     def test_a_camera_with_the_name_of_a_view_is_written_like_any_other(self):
         for name in ("Producer Left", "Producer Cam"):
@@ -228,12 +368,12 @@ class Convert(unittest.TestCase):
             self.assertEqual(len(cameras), 8)
             self.assertEqual(cameras[7], name)
 
-    def test_of_a_mesh_without_polygons_the_transform_is_written_and_the_rest_said(self):
+    def test_of_a_mesh_without_polygons_the_points_are_written(self):
         source = self.source("mesh_7400_ascii.fbx", ("*7 {\n\t\t\ta: 0,1,2,-4,3,2,-5", "*0 {\n\t\t\ta: "))
-        self.assertIn("not written: meshes without polygons: 1\n", self.convert(source=source).stderr)
-        page = dump(self.out)
-        self.assertEqual(page["meshes"], [])
-        self.assertIn("shape", [transform["name"] for transform in page["transforms"]])
+        self.assertIn("written as points: meshes without polygons: 1\n", self.convert(source=source).stderr)
+        before, after = (self.faithful(path, "--kind", "meshes")["meshes"][0] for path in (source, self.out))
+        self.assertEqual((after["name"], after["polygonVertexSizes"]), ("shape", []))
+        self.assertEqual(before["controlPoints"], after["controlPoints"])
 
     def test_what_becomes_of_markers_is_said(self):
         source = self.source("markers_7400_ascii.fbx")
@@ -332,9 +472,9 @@ class Convert(unittest.TestCase):
         self.assertTrue(result.stdout.startswith("; FBX 7.5.0 project file"))
 
     def test_says_what_the_library_warns_of(self):
-        result = self.convert("--fps", "29.97")
-
-        self.assertIn("frames per second: the file says that its rate is a custom one", result.stderr)
+        self.assertIn("moving: objects of one name get numbers",
+                      self.convert("--version", "2010", source=self.twins()).stderr)
+        self.assertEqual(run("convert", "--force", "--strict", "--version", "2010", self.twins(), self.out).returncode, 3)
 
 
 unittest.main(argv=sys.argv[:1], verbosity=0)

@@ -85,9 +85,9 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
 }
 
 void addConvert(CLI::App& app, tool::ConvertOptions& options) {
-    CLI::App* convert = app.add_subcommand("convert", "Write what the library reads into another FBX file");
+    CLI::App* convert = app.add_subcommand("convert", "Write what a file shows into another FBX file");
     convert->add_option("IN", options.input, "The FBX file to read; - for standard input")->required();
-    convert->add_option("OUT", options.output, "The FBX file to write")->required();
+    convert->add_option("OUT", options.output, "The FBX file to write; - for standard output")->required();
     convert
         ->add_option_function<std::string>(
             "--version",

@@ -1,18 +1,13 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A node with a new mesh: points, polygons, and one layer with what the polygon vertices carry.
-#include "FbxSdk.h"
-
-#include "calls/LastError.h"
+#include "MeshBuilding.h"
 
 #include <algorithm>
+#include <cstdint>
 #include <limits>
 
 namespace Tarnell::Fbx {
-
-using detail::fail;
-using detail::succeed;
 
 namespace {
 
@@ -25,21 +20,6 @@ constexpr std::int64_t kMostMissingCorners = 65536;
 double widen(float value) { return static_cast<double>(value); }
 
 fbxsdk::FbxVector4 point(float x, float y, float z) { return {widen(x), widen(y), widen(z), 1.0}; }
-
-/// Null, or why there is nothing to make a mesh of.
-const char* faultOf(const TnFbxMesh& mesh) {
-    if (mesh.getNumberOfControlPoints() < 1 || mesh.getNumberOfPolygons() < 1 ||
-        mesh.getNumberOfPolygonVertices() < 1) {
-        return "the mesh has no geometry";
-    }
-    std::int64_t corners = 0;
-    for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon) {
-        corners += std::max(mesh.getPolygonVertexSize(polygon), 0);
-    }
-    const bool fits = corners <= mesh.getNumberOfPolygonVertices() + kMostMissingCorners &&
-                      corners <= std::numeric_limits<int>::max();
-    return fits ? nullptr : "the polygons have more polygon vertices than the mesh";
-}
 
 /// The first set.
 void setPoints(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
@@ -130,48 +110,35 @@ fbxsdk::FbxLayer* firstLayer(fbxsdk::FbxMesh& mesh) {
     return mesh.GetLayer(0);
 }
 
-std::nullptr_t none(const char* reason) {
-    fail(reason);
-    return nullptr;
-}
-
 } // namespace
 
-fbxsdk::FbxNode* FbxSdk::createMesh(fbxsdk::FbxManager* manager, const TnFbxMesh* mesh, const std::string& name) {
-    if (manager == nullptr || mesh == nullptr) {
-        return none("no FBX manager or no mesh to make a mesh of");
+bool detail::claimsTooManyCorners(const TnFbxMesh& mesh) {
+    std::int64_t corners = 0;
+    for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon) {
+        corners += std::max(mesh.getPolygonVertexSize(polygon), 0);
     }
-    if (const char* fault = faultOf(*mesh)) {
-        return none(fault);
-    }
-    fbxsdk::FbxMesh* target = fbxsdk::FbxMesh::Create(manager, name.c_str());
-    if (target == nullptr) {
-        return none("a mesh cannot be made");
-    }
-    setPoints(*mesh, *target);
-    fbxsdk::FbxLayer* layer = firstLayer(*target);
-    if (layer == nullptr) {
-        return none("a mesh without a layer cannot be filled");
-    }
-    if (mesh->getValidNormals()) {
-        setNormals(*mesh, *target, *layer);
-    }
-    if (mesh->getValidUVs()) {
-        setUVs(*mesh, *target, *layer);
-    }
-    if (mesh->getValidColours()) {
-        setColours(*mesh, *target, *layer);
-    }
-    addPolygons(*mesh, *target);
+    const bool fits = corners <= mesh.getNumberOfPolygonVertices() + kMostMissingCorners &&
+                      corners <= std::numeric_limits<int>::max();
+    return !fits;
+}
 
-    fbxsdk::FbxNode* node = fbxsdk::FbxNode::Create(manager, name.c_str());
-    if (node == nullptr) {
-        return none("a node cannot be made");
+bool detail::buildMesh(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
+    setPoints(mesh, target);
+    fbxsdk::FbxLayer* layer = firstLayer(target);
+    if (layer == nullptr) {
+        return false;
     }
-    node->SetNodeAttribute(target);
-    node->SetShadingMode(fbxsdk::FbxNode::eTextureShading);
-    succeed();
-    return node;
+    if (mesh.getValidNormals()) {
+        setNormals(mesh, target, *layer);
+    }
+    if (mesh.getValidUVs()) {
+        setUVs(mesh, target, *layer);
+    }
+    if (mesh.getValidColours()) {
+        setColours(mesh, target, *layer);
+    }
+    addPolygons(mesh, target);
+    return true;
 }
 
 } // namespace Tarnell::Fbx

@@ -1,0 +1,65 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// The scene that is written: its stack, its rate, and what is said about objects.
+#pragma once
+
+#include "KeyWriting.h"
+#include "access/ObjectWarnings.h"
+
+#include "TnFbxWriteInfo.h"
+
+#include <fbxsdk.h>
+
+#include <memory>
+#include <set>
+#include <string>
+
+namespace Tarnell::Fbx::faithful {
+
+/// An empty scene of one stack with one layer.
+class WrittenScene {
+public:
+    WrittenScene() = default;
+    ~WrittenScene();
+    WrittenScene(const WrittenScene&) = delete;
+    WrittenScene& operator=(const WrittenScene&) = delete;
+
+    /// Once. False, with the reason noted, when there is no manager to be had.
+    bool begin(const TnFbxWriteInfo& info);
+    /// States the span, and hands the warnings over.
+    void finish();
+
+    const TnFbxWriteInfo& info() const { return *mInfo; }
+    fbxsdk::FbxManager& manager() const { return *mManager; }
+    fbxsdk::FbxScene& scene() const { return *mScene; }
+    KeyWriter& keys() { return *mKeys; }
+    /// Frames per second, exactly.
+    double rate() const { return mRate; }
+    detail::ObjectWarnings& warnings() { return mWarnings; }
+
+    /// A node of the name below another one, or below the root.
+    fbxsdk::FbxNode& addNode(const std::string& name, fbxsdk::FbxNode* parent = nullptr);
+    /// A new attribute of the node, with its name.
+    template <class Attribute>
+    Attribute& add(fbxsdk::FbxNode& node) {
+        auto* attribute = Attribute::Create(mScene, node.GetName());
+        node.SetNodeAttribute(attribute);
+        return *attribute;
+    }
+
+    /// A name for a point cache that no other cache of the file has, in whatever case.
+    std::string cacheNameFor(const std::string& mesh);
+
+private:
+    const TnFbxWriteInfo* mInfo = nullptr;
+    fbxsdk::FbxManager* mManager = nullptr; // owned
+    fbxsdk::FbxScene* mScene = nullptr;     // the manager's
+    fbxsdk::FbxAnimStack* mStack = nullptr;
+    std::unique_ptr<KeyWriter> mKeys;
+    double mRate = 24.0;
+    detail::ObjectWarnings mWarnings;
+    std::set<std::string> mNodeNames, mCacheNames;
+};
+
+} // namespace Tarnell::Fbx::faithful
