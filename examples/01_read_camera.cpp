@@ -14,7 +14,7 @@ int main(int, char** argv) {
     using namespace Tarnell::Fbx;
     TnFbxReadInfo info;
     info.setFileName(argv[1]);
-    info.setAnimationStackName("Take 001"); // any name: the first stack of the file is read
+    info.setFidelity(kFbxFidelityFaithful); // what the application shows, of the first stack
 
     TnFbxCamera* cameras = nullptr;
     int count = 0;

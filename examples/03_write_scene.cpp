@@ -134,6 +134,7 @@ int main(int argc, char** argv) {
     TnFbxWriteInfo info;
     info.setFileName(argv[1]);
     info.setAnimationStackName("Take 001");
+    info.setFidelity(kFbxFidelityFaithful);
     info.setFileFormat(isGiven("--ascii"));
     info.setFPS(kFramesPerSecond);
     info.setStartFrame(static_cast<float>(kFirst)); // of the shot, and of its point cache

@@ -74,7 +74,8 @@ public:
     /// Writes one file, and beside it the point caches of animated meshes. The objects are only read; null pointers are
     /// left out, and so are kinds that `info` does not ask for. There are no markers: they are read but never written.
     /// False when `info` names no file or no animation stack, and when the file cannot be written. Curves go into the
-    /// stack "Take 001", whatever the name.
+    /// stack "Take 001", whatever the name. With `kFbxFidelityFaithful` in `info` they go into the stack of the name,
+    /// which may be empty, and what is written comes back: docs/faithful.md.
     /// The file and its caches appear together, or what stood there before stays. A mesh whose cache cannot be written
     /// is written without it; `lastWarnings()` says so, and what else the file lacks or no program will understand.
     bool writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,

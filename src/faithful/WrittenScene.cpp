@@ -82,8 +82,9 @@ fbxsdk::FbxNode& WrittenScene::addNode(const std::string& name, fbxsdk::FbxNode*
 
 std::string WrittenScene::cacheNameFor(const std::string& mesh) {
     std::string name = mesh;
-    for (int number = 2; !mCacheNames.insert(inLowerCase(detail::pointCacheName(name))).second; ++number) {
-        name = mesh + ' ' + std::to_string(number);
+    int& number = mNextNumbers.try_emplace(mesh, 2).first->second;
+    while (!mCacheNames.insert(inLowerCase(detail::pointCacheName(name))).second) {
+        name = mesh + ' ' + std::to_string(number++);
     }
     return name;
 }

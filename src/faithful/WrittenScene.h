@@ -11,6 +11,7 @@
 
 #include <fbxsdk.h>
 
+#include <map>
 #include <memory>
 #include <set>
 #include <string>
@@ -60,6 +61,7 @@ private:
     double mRate = 24.0;
     detail::ObjectWarnings mWarnings;
     std::set<std::string> mNodeNames, mCacheNames;
+    std::map<std::string, int> mNextNumbers; // of caches, by the name of their mesh
 };
 
 } // namespace Tarnell::Fbx::faithful

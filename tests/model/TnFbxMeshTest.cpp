@@ -331,6 +331,18 @@ TEST(TnFbxMesh, AssignmentCopiesTheGeometryAndKeepsTransformAndName) {
     expectMarkedTransform(target, "target", -1.0f);
 }
 
+TEST(TnFbxMesh, SaysWhetherItsPointsArePlacedUntilItsGeometryGoes) {
+    TnFbxMesh mesh;
+    EXPECT_FALSE(mesh.getPointsPlaced());
+    EXPECT_TRUE(mesh.setPointsPlaced(true));
+    TnFbxMesh assigned;
+    assigned = mesh;
+    EXPECT_TRUE(assigned.getPointsPlaced());
+    EXPECT_TRUE(TnFbxMesh(mesh).getPointsPlaced());
+    mesh.initMesh();
+    EXPECT_FALSE(mesh.getPointsPlaced());
+}
+
 TEST(TnFbxMesh, AssignmentToItselfChangesNothing) {
     TnFbxMesh mesh = filledMesh();
     const TnFbxMesh& alias = mesh;

@@ -38,6 +38,7 @@ constexpr Flag kFlags[] = {
     {"WriteMeshes", &TnFbxWriteInfo::setWriteMeshes, &TnFbxWriteInfo::getWriteMeshes},
     {"AnimateMeshVertices", &TnFbxWriteInfo::setAnimateMeshVertices, &TnFbxWriteInfo::getAnimateMeshVertices},
     {"MayaVertexCacheFormat", &TnFbxWriteInfo::setMayaVertexCacheFormat, &TnFbxWriteInfo::getMayaVertexCacheFormat},
+    {"ComputeCameraRotation", &TnFbxWriteInfo::setComputeCameraRotation, &TnFbxWriteInfo::getComputeCameraRotation},
 };
 
 void expectDefaults(const TnFbxWriteInfo& info) {

@@ -11,7 +11,7 @@ import unittest
 
 from support import ROOT, dump, run
 
-MOVING = os.path.join(ROOT, "tests", "data", "tool", "moving_triangle.fbx")
+SHAPED = os.path.join(ROOT, "tests", "data", "tool", "shaped_triangle.fbx")
 FRAMES = "1003:1006"
 
 
@@ -22,7 +22,7 @@ class Cache(unittest.TestCase):
         folder = tempfile.TemporaryDirectory()
         self.addCleanup(folder.cleanup)
         self.file = os.path.join(folder.name, "shot.fbx")
-        result = run("convert", MOVING, self.file, "--frames", FRAMES, "--cache", self.kind)
+        result = run("convert", SHAPED, self.file, "--frames", FRAMES, "--cache", self.kind)
         self.assertEqual(result.returncode, 0, result.stderr)
         self.caches = self.file[:-4] + "_fpc"
 

@@ -235,8 +235,9 @@ class Usage(unittest.TestCase):
             self.assertTrue(lossy.stderr)
             self.assertEqual(run(*arguments, "--strict").returncode, 3)
             self.assertTrue(os.path.exists(os.path.join(folder, "out.fbx")))
-            without = ("convert", "--force", "--strict", "--kind", "nulls",
-                       os.path.join(SDK_DATA, "nulls_7400_ascii.fbx"), os.path.join(folder, "out.fbx"))
+            without = ("convert", "--force", "--strict",
+                       os.path.join(ROOT, "tests", "data", "tool", "moving_triangle.fbx"),
+                       os.path.join(folder, "out.fbx"))
             self.assertEqual(run(*without).returncode, 0)
 
 

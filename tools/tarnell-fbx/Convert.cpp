@@ -8,6 +8,8 @@
 #include <fstream>
 #include <iostream>
 #include <memory>
+#include <set>
+#include <system_error>
 
 #include <stdlib.h> // mkdtemp
 
@@ -106,7 +108,7 @@ private:
     /// Keeps what the call noticed.
     bool done(bool result) {
         for (const std::string& warning : lastWarnings()) {
-            if (std::find(mWarnings.begin(), mWarnings.end(), warning) == mWarnings.end())
+            if (mKnownWarnings.insert(warning).second)
                 mWarnings.push_back(warning);
         }
         return result;
@@ -222,6 +224,7 @@ private:
     int mMarkers = 0, mBones = 0, mDeforming = 0, mWithoutPolygons = 0;
     Losses mLosses;
     std::vector<std::string> mWarnings;
+    std::set<std::string> mKnownWarnings;
 };
 
 /// Where the library puts the point caches of a file.

@@ -37,6 +37,7 @@ struct NodeCounts {
     int parents = 0, hidden = 0, ownProperties = 0;
     int surfaces = 0, others = 0;
     int zooms = 0, gateFits = 0, lights = 0;
+    int furtherCaches = 0;
     int furtherUVs = 0, furtherNormals = 0, furtherColours = 0;
 
     void add(FbxNode& node) {
@@ -82,6 +83,7 @@ private:
         furtherUVs += further(mesh, FbxLayerElement::eUV);
         furtherNormals += further(mesh, FbxLayerElement::eNormal);
         furtherColours += further(mesh, FbxLayerElement::eVertexColor);
+        furtherCaches += std::max(mesh.GetDeformerCount(FbxDeformer::eVertexCache) - 1, 0);
     }
 };
 
@@ -112,11 +114,12 @@ void Losses::addScene(FbxScene& scene) {
     add(nodes.furtherUVs, "not written: further sets of texture coordinates");
     add(nodes.furtherNormals, "not written: further sets of normals");
     add(nodes.furtherColours, "not written: further sets of colours");
+    add(nodes.furtherCaches, "not written: caches of normals and further ones of meshes");
     add(nodes.zooms, "not written: zooms of orthographic cameras");
     add(nodes.gateFits, "not written: gate fits of cameras");
     add(nodes.lights, "written as point lights: area and volume lights");
     add(nodes.surfaces, "written as meshes: surfaces");
-    add(nodes.others, "written as nulls: curves, lines and other things that are neither");
+    add(nodes.others, "written as nulls: curves, lines and other attributes");
     add(nodes.hidden, "written as visible: objects that are hidden or whose visibility is animated");
     add(nodes.ownProperties, "not written: properties that users added to objects");
 }

@@ -17,6 +17,7 @@
 #include "StandardInput.h"
 
 #include "Fbx.h"
+#include "FbxFaithful.h"
 #include "FbxSdk.h"
 #include "TnFbxCamera.h"
 #include "TnFbxError.h"
@@ -221,8 +222,10 @@ public:
 
     /// Empty when the file was read, else why it was not.
     std::string load() {
-        if (mOptions.faithful)
-            return mFacts.load(mOptions.file);
+        if (mOptions.faithful) {
+            const std::string fault = mFacts.load(mOptions.file);
+            return fault.empty() && !mReader.load(mInfo) ? lastError() : fault;
+        }
         return mFbx.loadScene(mOptions.file, mSdk) ? std::string() : lastError();
     }
 
@@ -335,22 +338,18 @@ private:
                                        mInfo.getObjectName(), mSdk);
     }
 
-    /// How the objects of a kind are read: through the facade when their values are faithful, else from the scene that
-    /// is loaded.
+    /// How the objects of a kind are read when their values are compatible.
     template <class Object>
-    struct Source {
-        bool (Tarnell::Fbx::Fbx::*faithful)(TnFbxReadInfo&, Object**, int&) const;
-        bool (FbxSdk::*fill)(TnFbxReadInfo&, Object*, int);
-    };
+    using Fill = bool (FbxSdk::*)(TnFbxReadInfo&, Object*, int);
 
     /// Reads all objects of one kind, or the named one, and hands each to `each`.
     template <class Object, class Each>
-    bool read(const Kind& kind, const Source<Object>& source, const Each& each) {
+    bool read(const Kind& kind, Fill<Object> fill, const Each& each) {
         Object* made = nullptr;
         int number = 0;
         bool complete = true;
         if (mOptions.faithful) {
-            complete = (mFbx.*source.faithful)(mInfo, &made, number);
+            complete = mReader.readAll(&made, number);
             mFacts.beginNodes(kind.name);
         } else {
             number = count(kind);
@@ -360,17 +359,17 @@ private:
         }
         const std::unique_ptr<Object[]> objects(made);
         if (!mOptions.faithful)
-            complete = (mSdk.*source.fill)(mInfo, made, number);
+            complete = (mSdk.*fill)(mInfo, made, number);
         for (int i = 0; i < number; ++i)
             each(objects[static_cast<std::size_t>(i)]);
         return complete;
     }
 
     template <class Object>
-    bool printKind(const Kind& kind, const Source<Object>& source) {
+    bool printKind(const Kind& kind, Fill<Object> fill) {
         mJson.key(kind.name);
         mJson.beginArray();
-        const bool complete = read<Object>(kind, source, [&](Object& object) {
+        const bool complete = read<Object>(kind, fill, [&](Object& object) {
             mJson.beginObject();
             mPrinter.transform(object);
             if (mOptions.faithful)
@@ -392,6 +391,8 @@ private:
         for (long long frame = first; frame <= last; ++frame) {
             const float at = ranged ? static_cast<float>(frame) : mOptions.frame;
             mInfo.setFrame(at);
+            if (mOptions.faithful)
+                mReader.setFrame(at);
             const auto print = [&](TnFbxMesh& mesh) {
                 mJson.beginObject();
                 mPrinter.transform(mesh);
@@ -401,7 +402,7 @@ private:
                 mPrinter.details(mesh);
                 mJson.endObject();
             };
-            complete = read<TnFbxMesh>(kind, {&Tarnell::Fbx::Fbx::getMeshes, &FbxSdk::getMeshes}, print) && complete;
+            complete = read<TnFbxMesh>(kind, &FbxSdk::getMeshes, print) && complete;
         }
         mInfo.setFrame(mOptions.frame);
         mJson.endArray();
@@ -413,33 +414,23 @@ private:
     ObjectPrinter mPrinter;
     TnFbxReadInfo mInfo;
     Tarnell::Fbx::Fbx mFbx;
-    FbxSdk mSdk;      // of compatible values
-    FileFacts mFacts; // of faithful ones
+    FbxSdk mSdk;         // of compatible values
+    FileFacts mFacts;    // of faithful ones
+    FbxFaithful mReader; // of their values
 };
 
 const std::vector<Dump::Kind>& Dump::kinds() {
-    using Facade = Tarnell::Fbx::Fbx;
     static const std::vector<Kind> kKinds = {
         {"cameras", &FbxSdk::getNumberOfCameras, 32,
-         [](Dump& d, const Kind& kind) {
-             return d.printKind<TnFbxCamera>(kind, {&Facade::getCameras, &FbxSdk::getCameras});
-         }},
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxCamera>(kind, &FbxSdk::getCameras); }},
         {"lights", &FbxSdk::getNumberOfLights, 64,
-         [](Dump& d, const Kind& kind) {
-             return d.printKind<TnFbxLight>(kind, {&Facade::getLights, &FbxSdk::getLights});
-         }},
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxLight>(kind, &FbxSdk::getLights); }},
         {"markers", &FbxSdk::getNumberOfMarkers, 1,
-         [](Dump& d, const Kind& kind) {
-             return d.printKind<TnFbxMarker>(kind, {&Facade::getMarkers, &FbxSdk::getMarkers});
-         }},
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxMarker>(kind, &FbxSdk::getMarkers); }},
         {"nulls", &FbxSdk::getNumberOfNulls, 0x4000,
-         [](Dump& d, const Kind& kind) {
-             return d.printKind<TnFbxNull>(kind, {&Facade::getNulls, &FbxSdk::getNulls});
-         }},
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxNull>(kind, &FbxSdk::getNulls); }},
         {"transforms", &FbxSdk::getNumberOfTransforms, 0x4005,
-         [](Dump& d, const Kind& kind) {
-             return d.printKind<TnFbxTransform>(kind, {&Facade::getTransforms, &FbxSdk::getTransforms});
-         }},
+         [](Dump& d, const Kind& kind) { return d.printKind<TnFbxTransform>(kind, &FbxSdk::getTransforms); }},
         {"meshes", &FbxSdk::getNumberOfMeshes, 4, [](Dump& d, const Kind& kind) { return d.printMeshes(kind); }},
     };
     return kKinds;
