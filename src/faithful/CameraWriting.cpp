@@ -89,7 +89,7 @@ constexpr LensRow kLensRows[] = {
 /// The lens of a camera at any frame.
 class LensSource {
 public:
-    LensSource(const KeyWriter& keys, TnFbxCamera& camera)
+    LensSource(KeyWriter& keys, TnFbxCamera& camera)
         : mKeys(keys), mCamera(camera), mMode(camera.getApertureMode()), mDrivers(driversOf(mMode)),
           mInches(inchesPerUnit(camera)) {
         std::vector<const TnFbxChannel*> channels = {&channelOf(camera, TnFbxCamera::kFbxCameraApertureWidth),
@@ -163,7 +163,7 @@ void writeLens(KeyWriter& keys, TnFbxCamera& source, FbxCamera& camera) {
 /// The direction that a camera's rotation and its look-at channels give.
 class LookAt {
 public:
-    LookAt(const KeyWriter& keys, TnFbxCamera& camera) : mKeys(keys), mCamera(camera) {
+    LookAt(KeyWriter& keys, TnFbxCamera& camera) : mKeys(keys), mCamera(camera) {
         std::vector<const TnFbxChannel*> channels;
         for (int i = TnFbxCamera::kFbxCameraLookAtPositionX; i <= TnFbxCamera::kFbxCameraRoll; ++i) {
             channels.push_back(&channelOf(camera, i));

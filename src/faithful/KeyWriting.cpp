@@ -63,7 +63,14 @@ private:
     float mValue = 0.0f;
 };
 
-std::int64_t wholeFrame(double frame) { return static_cast<std::int64_t>(frame); }
+/// Rates may be as far apart as numbers are.
+std::int64_t wholeFrame(double frame) {
+    constexpr double kFarthest = 1e15;
+    return static_cast<std::int64_t>(std::clamp(frame, -kFarthest, kFarthest));
+}
+
+/// What a frame takes of which several channels make a key: three curves with a time and a value each.
+constexpr std::uint64_t kFrameBytes = 48;
 
 double sampleOf(const TnFbxChannel& channel, std::int64_t frame) {
     return static_cast<double>(channel.getAnimatedValue(static_cast<float>(frame)));
@@ -84,7 +91,7 @@ FrameRange KeyWriter::rangeOf(const TnFbxChannel& channel) const {
     return {time.getStartFrame(), time.getEndFrame(), isRate(rate) ? rate : mRate};
 }
 
-FrameRange KeyWriter::rangeOf(const std::vector<const TnFbxChannel*>& channels) const {
+FrameRange KeyWriter::rangeOf(const std::vector<const TnFbxChannel*>& channels) {
     FrameRange common{0, 0, mRate};
     bool any = false;
     for (const TnFbxChannel* channel : channels) {
@@ -101,7 +108,8 @@ FrameRange KeyWriter::rangeOf(const std::vector<const TnFbxChannel*>& channels) 
         common.first = std::min(common.first, wholeFrame(std::floor(static_cast<double>(range.first) * ratio)));
         common.last = std::max(common.last, wholeFrame(std::ceil(static_cast<double>(range.last) * ratio)));
     }
-    return common;
+    const bool isGranted = mMemory.take(static_cast<std::uint64_t>(common.count()) * kFrameBytes);
+    return isGranted ? common : FrameRange{common.first, common.first, common.rate};
 }
 
 double KeyWriter::valueAt(const TnFbxChannel& channel, std::int64_t frame, const FrameRange& range) const {

@@ -5,6 +5,7 @@
 #pragma once
 
 #include "access/WrittenSpan.h"
+#include "calls/MemoryLimit.h"
 
 #include "TnFbxChannel.h"
 
@@ -39,7 +40,7 @@ using ValueAt = std::function<double(std::int64_t frame)>;
 class KeyWriter {
 public:
     /// `rate`: frames per second of channels that state none.
-    KeyWriter(fbxsdk::FbxAnimLayer& layer, double rate) : mLayer(layer), mRate(rate) {}
+    KeyWriter(fbxsdk::FbxAnimLayer& layer, double rate) : mLayer(layer), mRate(rate) { mMemory.begin(); }
 
     /// `factor` times the static value, and the samples as keys. Of samples that stay the same the first and the last
     /// one become keys.
@@ -51,13 +52,16 @@ public:
     void writeKeys(fbxsdk::FbxProperty property, const char* component, const FrameRange& range,
                    const ValueAt& valueAt);
 
-    /// The frames of a channel, and those of some channels together; one frame where none of them changes.
+    /// The frames of a channel, and those of some channels together; one frame where none of them changes, and where
+    /// their ranges and rates are so far apart that the keys would go beyond the memory limit.
     FrameRange rangeOf(const TnFbxChannel& channel) const;
-    FrameRange rangeOf(const std::vector<const TnFbxChannel*>& channels) const;
+    FrameRange rangeOf(const std::vector<const TnFbxChannel*>& channels);
     /// The channel at a frame of another range.
     double valueAt(const TnFbxChannel& channel, std::int64_t frame, const FrameRange& range) const;
 
     detail::WrittenSpan& span() { return mSpan; }
+    /// What the keys of several channels take together.
+    const detail::MemoryAccount& memory() const { return mMemory; }
 
 private:
     void extendSpan(const FrameRange& range);
@@ -66,6 +70,7 @@ private:
     fbxsdk::FbxAnimLayer& mLayer;
     double mRate;
     detail::WrittenSpan mSpan;
+    detail::MemoryAccount mMemory;
 };
 
 } // namespace Tarnell::Fbx::faithful

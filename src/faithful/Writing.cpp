@@ -3,6 +3,7 @@
 #include "Writing.h"
 
 #include "access/WriterChoice.h"
+#include "calls/LastError.h"
 
 namespace Tarnell::Fbx::faithful {
 
@@ -42,6 +43,9 @@ bool writeObjects(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& c
     addAll(scene, info.getWriteNulls(), nulls);
     addAll(scene, info.getWriteMeshes(), meshes);
     scene.finish();
+    if (scene.keys().memory().exceeded()) {
+        return detail::fail(info.getFileName() + ": " + scene.keys().memory().describe("keys"));
+    }
     return save(scene);
 }
 

@@ -61,6 +61,23 @@ TEST_F(KeyMemory, OfAllChannelsCountsTogether) {
     EXPECT_FALSE(write(2000));
 }
 
+// Channels at two rates are keyed together at the frames of one of them.
+TEST_F(KeyMemory, OfRatesThatAreFarApartIsRefusedWithAReason) {
+    const MemoryLimitScope limit(std::uint64_t{1} << 20);
+    TnFbxCamera camera;
+    camera.setValueAt(TnFbxCamera::kFbxCameraLookAtPositionX, test::timeOf(0, 3, 24.0f), {1.0f, 2.0f, 3.0f});
+    camera.setTransformValueAt(TnFbxTransform::kFbxTransformPositionX, test::timeOf(0, 3, 1e-6f), {1.0f, 2.0f, 3.0f});
+    TnFbxWriteInfo info;
+    info.setFileName(folder.file("shot.fbx"));
+    info.setAnimationStackName("Take 001");
+    info.setFidelity(kFbxFidelityFaithful);
+
+    EXPECT_FALSE(Fbx().writeFile(info, {&camera}, {}, {}, {}, {}));
+
+    EXPECT_THAT(lastError(), HasSubstr("of keys would be needed, and the limit is 1.0 MiB"));
+    EXPECT_THAT(folder.files(), IsEmpty());
+}
+
 TEST_F(KeyMemory, WithinTheLimitIsWritten) {
     const MemoryLimitScope limit(std::uint64_t{1} << 20);
 
