@@ -265,6 +265,18 @@ class Frames(Close):
             self.assertEqual((result.returncode, result.stdout), (1, ""))
             self.assertIn("1001 to 1010", result.stderr)
 
+    def test_a_keyed_node_above_moves_the_camera_along(self):
+        with open(self.FILE, encoding="utf-8") as stream:
+            text = stream.read()
+        below = text.replace("Objects:  {\n", 'Objects:  {\n\tModel: 50, "Model::rail", "Null" {\n\t}\n\tModel: 51, '
+                             '"Model::head", "Null" {\n\t}\n', 1)
+        below = below.replace('C: "OO",1,0', 'C: "OO",50,0\n\tC: "OO",51,50\n\tC: "OO",1,51', 1)
+        below = below.replace('C: "OP",5,1, "Lcl Translation"', 'C: "OP",5,50, "Lcl Translation"', 1)
+        camera = one(below, "--frames", "1001:1010")
+        self.assertEqual((camera["movedBy"], camera["moves"]), ("rail", True))
+        self.close(camera["frames"][9]["position"], [9, 0, 0])
+        self.assertIsNone(one(text)["movedBy"])
+
     def test_without_a_take_every_frame_is_alike(self):
         camera = one(scene({"FocalLength": 20.0, "ApertureMode": 3}), "--frames", "5:7")
         self.assertEqual([moment["frame"] for moment in camera["frames"]], [5, 6, 7])

@@ -163,14 +163,8 @@ void printIdle(const CameraFacts& camera, std::ostream& out, const Terminal& ter
 }
 
 void printChannels(const CameraFacts& camera, std::ostream& out, const Terminal& terminal) {
-    if (camera.channels.empty() && camera.movingParents.empty())
-        return;
-    if (!camera.movingParents.empty()) {
-        std::string parents;
-        for (const std::string& name : camera.movingParents)
-            parents += (parents.empty() ? "" : ", ") + inQuotes(name);
-        out << "  " << terminal.paint(Ink::faint, "Moved along by") << ' ' << parents << '\n';
-    }
+    if (camera.movedBy)
+        out << "  " << terminal.paint(Ink::faint, "Moved along by") << ' ' << inQuotes(*camera.movedBy) << '\n';
     Table table({{"Keys of"},
                  {"Count", Table::Align::right},
                  {"First frame", Table::Align::right},
@@ -341,11 +335,7 @@ void printSpace(const CameraFacts& camera, JsonWriter& json) {
     vector(json, "postRotation", camera.postRotation);
     json.boolean("rotationActive", camera.rotationActive);
     json.text("restDirection", camera.restDirection);
-    json.key("movingParents");
-    json.beginArray();
-    for (const std::string& name : camera.movingParents)
-        json.text(name);
-    json.endArray();
+    textOrNull(json, "movedBy", camera.movedBy.value_or(""), camera.movedBy.has_value());
 }
 
 void printChannels(const CameraFacts& camera, JsonWriter& json) {

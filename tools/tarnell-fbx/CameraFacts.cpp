@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <unordered_map>
 
 #include "CameraOrigins.h"
 #include "Curves.h"
@@ -164,12 +165,30 @@ private:
         facts.hasTarget = target != nullptr;
         facts.target = target ? target->GetName() : "";
         addRest(node, facts);
-        for (FbxNode* above = node.GetParent(); above && above->GetParent(); above = above->GetParent()) {
-            const FbxProperty moving[] = {above->LclTranslation, above->LclRotation, above->LclScaling};
-            if (std::any_of(std::begin(moving), std::end(moving),
+        if (const FbxNode* above = keyedFrom(node.GetParent()))
+            facts.movedBy = above->GetName();
+    }
+
+    /// The node or the nearest one above it whose place is keyed. What is known of those on the way stays known: trees
+    /// may be as deep as they like.
+    const FbxNode* keyedFrom(FbxNode* node) const {
+        std::vector<const FbxNode*> way;
+        const FbxNode* keyed = nullptr;
+        for (FbxNode* at = node; at && !keyed; at = at->GetParent()) {
+            const auto known = mKeyedFrom.find(at);
+            if (known != mKeyedFrom.end()) {
+                keyed = known->second;
+                break;
+            }
+            way.push_back(at);
+            const FbxProperty place[] = {at->LclTranslation, at->LclRotation, at->LclScaling};
+            if (std::any_of(std::begin(place), std::end(place),
                             [this](const FbxProperty& property) { return keyCount(property, mTake) > 0; }))
-                facts.movingParents.emplace_back(above->GetName());
+                keyed = at;
         }
+        for (const FbxNode* each : way)
+            mKeyedFrom[each] = keyed;
+        return keyed;
     }
 
     static void addRest(const FbxNode& node, CameraFacts& facts) {
@@ -197,6 +216,7 @@ private:
     const SceneFile& mOpened;
     FbxAnimStack* mTake;
     const TakeFacts& mFacts;
+    mutable std::unordered_map<const FbxNode*, const FbxNode*> mKeyedFrom;
 };
 
 CameraMoment CameraFacts::at(double frame) const {

@@ -90,7 +90,7 @@ public:
     Vector3 preRotation{}, postRotation{}; ///< degrees
     bool rotationActive = false;           ///< whether those are in force
     std::string restDirection;             ///< where rotation 0 looks in the parent's space: "−Z"
-    std::vector<std::string> movingParents;
+    std::optional<std::string> movedBy;    ///< the nearest node above it that is keyed
     std::vector<CameraChannel> channels;
     std::vector<IdleValue> idle;
     std::vector<Origin> origins;
