@@ -13,7 +13,7 @@ import subprocess
 import tempfile
 import unittest
 
-from support import SDK_DATA, SHOT, TOOL, edited, run
+from support import ROOT, SDK_DATA, SHOT, TOOL, edited, run
 
 INCH = 25.4
 MODES = ("twoAngles", "horizontalAngle", "verticalAngle", "focalLength")  # as files number them
@@ -276,6 +276,17 @@ class Frames(Close):
         self.assertEqual((camera["movedBy"], camera["moves"]), ("rail", True))
         self.close(camera["frames"][9]["position"], [9, 0, 0])
         self.assertIsNone(one(text)["movedBy"])
+
+    def test_that_are_too_many_are_refused(self):
+        with open(os.path.join(ROOT, "tests", "data", "lint", "take-without-keys.fbx"), encoding="utf-8") as stream:
+            text = stream.read()
+        stop = next(line for line in text.splitlines() if '"LocalStop"' in line)
+        text = text.replace(stop, stop.rsplit(",", 1)[0] + ",4618615800000000000")
+        self.assertEqual(run("camera", "-", input=text).returncode, 0)
+        for arguments in (("--csv",), ("--frames", "0:2000000")):
+            result = run("camera", *arguments, "-", input=text)
+            self.assertEqual(result.returncode, 1, arguments)
+            self.assertIn("too many", result.stderr)
 
     def test_without_a_take_every_frame_is_alike(self):
         camera = one(scene({"FocalLength": 20.0, "ApertureMode": 3}), "--frames", "5:7")

@@ -23,20 +23,24 @@ struct Range {
     long long first, last;
 };
 
-/// The frames that were asked for, or those of the take. Throws Unreadable where the take has not all of them.
+/// The frames that were asked for, or those of the take. Throws Unreadable where the take has not all of them, or where
+/// too many are to be printed.
 Range rangeOf(const CameraList& list, const CameraOptions& options) {
-    const Range take{list.take.firstFrame, list.take.lastFrame};
-    if (!options.frames)
-        return take;
-    const Range asked{options.frames->first, options.frames->second};
-    if (list.take.exists && (asked.first < take.first || asked.last > take.last))
-        throw Unreadable("frames " + std::to_string(asked.first) + " to " + std::to_string(asked.last) +
-                         " were asked for, and the take has " + std::to_string(take.first) + " to " +
-                         std::to_string(take.last));
+    Range range{list.take.firstFrame, list.take.lastFrame};
+    if (options.frames) {
+        const Range asked{options.frames->first, options.frames->second};
+        if (list.take.exists && (asked.first < range.first || asked.last > range.last))
+            throw Unreadable("frames " + std::to_string(asked.first) + " to " + std::to_string(asked.last) +
+                             " were asked for, and the take has " + std::to_string(range.first) + " to " +
+                             std::to_string(range.last));
+        range = asked;
+    }
     constexpr long long kMostFrames = 1 << 20;
-    if (asked.last - asked.first >= kMostFrames)
-        throw Unreadable("more than " + std::to_string(kMostFrames) + " frames are asked for");
-    return asked;
+    const bool printsAll = options.frames || options.form == Form::csv;
+    if (printsAll && range.last - range.first >= kMostFrames)
+        throw Unreadable("frames " + std::to_string(range.first) + " to " + std::to_string(range.last) +
+                         " are too many to be printed; --frames A:B picks some");
+    return range;
 }
 
 void keepNamed(CameraList& list, const std::string& name) {

@@ -86,7 +86,7 @@ private:
         const std::size_t count = placed.change() ? mComparison.moments.size() : 1;
         Difference worst{DiffKind::transform, pair.a->GetName(), what, {}, {}, {}, unit, {}, 0};
         for (std::size_t i = 0; i < count; ++i) {
-            const DiffMoment& moment = mComparison.moments[i];
+            const DiffMoment moment = mComparison.moments[i];
             Apart apart = measure(placesAt(placed, moment));
             const bool differs = !(apart.amount <= mComparison.settings.tolerance * apart.size);
             const double amount = *unit == '\0' || *unit == 'c' ? apart.amount : apart.amount * kDegrees;
