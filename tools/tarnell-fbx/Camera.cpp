@@ -9,6 +9,7 @@
 #include "CameraOrigins.h"
 #include "Commands.h"
 #include "Csv.h"
+#include "Lines.h"
 #include "SceneFacts.h"
 #include "SceneQueries.h"
 #include "ShowFiles.h"
@@ -79,22 +80,6 @@ std::string pictureText(const CameraFacts& camera, const CameraMoment& moment) {
     return text + "; gate fit " + gateFitName(camera.gateFit) + " → " + degrees(moment.pictureFovX, moment.pictureFovY);
 }
 
-/// Prints "  Label         text".
-class Lines {
-public:
-    Lines(std::ostream& out, const Terminal& terminal) : mOut(out), mTerminal(terminal) {}
-
-    void line(std::string_view label, const std::string& text) {
-        constexpr std::size_t kColumn = 14;
-        mOut << "  " << mTerminal.paint(Ink::faint, label)
-             << std::string(kColumn - std::min(kColumn, label.size()), ' ') << terminalText(text) << '\n';
-    }
-
-private:
-    std::ostream& mOut;
-    const Terminal& mTerminal;
-};
-
 void printTitle(const CameraFacts& camera, std::ostream& out, const Terminal& terminal) {
     out << terminal.paint(Ink::name, terminalText(camera.name)) << "  " << (camera.stereo ? "stereo, " : "")
         << (camera.orthographic ? "orthographic"
@@ -119,26 +104,15 @@ void printLens(const CameraFacts& camera, const CameraMoment& moment, Lines& lin
     lines.line("Clip planes", significant(moment.nearPlane, 6) + " to " + significant(moment.farPlane, 6) + " cm");
 }
 
-double distance(const Vector3& a, const Vector3& b) { return std::hypot(a[0] - b[0], a[1] - b[1], a[2] - b[2]); }
-
-/// Whether the camera looks at the point of interest, to a degree.
-bool isAhead(const CameraMoment& moment, double away) {
-    constexpr double kCosine = 0.9998;
-    double along = 0.0;
-    for (std::size_t axis = 0; axis < 3; ++axis)
-        along += (moment.interest[axis] - moment.position[axis]) * moment.direction[axis];
-    return along > kCosine * away;
-}
-
 void printPlace(const CameraFacts& camera, const CameraMoment& moment, Lines& lines) {
     lines.line("World", vectorText(moment.position, 3) + " cm, looks " + vectorText(moment.direction, 3));
-    const double away = distance(moment.interest, moment.position);
-    const std::string there = vectorText(moment.interest, 3) + " cm, " + rounded(away, 3) + " cm away";
+    const std::string there =
+        vectorText(moment.interest, 3) + " cm, " + rounded(moment.interestDistance(), 3) + " cm away";
     if (camera.hasTarget) {
         lines.line("Target", inQuotes(camera.target) + " at " + there);
         lines.line("Roll", rounded(moment.roll, 4) + "°");
     } else {
-        lines.line("Interest", there + (isAhead(moment, away) ? "" : ", not where it looks"));
+        lines.line("Interest", there + (moment.looksAtInterest() ? "" : ", not where it looks"));
     }
     constexpr double kTolerance = 1e-4;
     const Vector3& scale = camera.scale;

@@ -33,10 +33,6 @@ std::vector<FbxNode*> cameraNodes(FbxScene& scene) {
     return nodes;
 }
 
-double lengthOf(const FbxVector4& vector) {
-    return std::sqrt(vector[0] * vector[0] + vector[1] * vector[1] + vector[2] * vector[2]);
-}
-
 Vector3 unitVector(const FbxVector4& vector) {
     const double length = lengthOf(vector);
     return {vector[0] / length, vector[1] / length, vector[2] / length};
@@ -218,6 +214,19 @@ private:
     const TakeFacts& mFacts;
     mutable std::unordered_map<const FbxNode*, const FbxNode*> mKeyedFrom;
 };
+
+double CameraMoment::interestDistance() const {
+    return std::hypot(interest[0] - position[0], interest[1] - position[1], interest[2] - position[2]);
+}
+
+double CameraMoment::interestAngle() const {
+    constexpr double kDegrees = 57.295779513082320877;
+    const double away = interestDistance();
+    double along = 0.0;
+    for (std::size_t axis = 0; axis < 3; ++axis)
+        along += (interest[axis] - position[axis]) * direction[axis];
+    return away > 0.0 ? std::acos(std::clamp(along / away, -1.0, 1.0)) * kDegrees : 0.0;
+}
 
 CameraMoment CameraFacts::at(double frame) const {
     const auto value = [&](TnFbxCamera::EFbxCameraChannelType channel) {

@@ -37,6 +37,12 @@ struct CameraMoment {
     Vector3 position{};                          ///< in the world, centimetres, Y up
     Vector3 direction{}, up{};                   ///< in the world, unit length
     Vector3 interest{};                          ///< the target's place, or the point of interest
+
+    [[nodiscard]] double interestDistance() const; ///< centimetres
+    /// Between the direction it looks in and the one to the point; 0 at the point itself.
+    [[nodiscard]] double interestAngle() const; ///< degrees
+    /// To a degree.
+    [[nodiscard]] bool looksAtInterest() const { return interestAngle() <= 1.0; }
 };
 
 /// A number that keys drive.

@@ -27,8 +27,6 @@ bool changes(const TnFbxTransform& object) {
     return false;
 }
 
-double lengthOf(const FbxVector4& vector) { return std::hypot(vector[0], vector[1], vector[2]); }
-
 double distance(const FbxVector4& a, const FbxVector4& b) { return lengthOf({a[0] - b[0], a[1] - b[1], a[2] - b[2]}); }
 
 /// A node in both files: axes without the unit, which scales the tops of the tree when files are brought to
