@@ -152,6 +152,16 @@ int dumpOf(const std::string& file) {
     return tool::dump(options);
 }
 
+/// Findings and differences are none of a failure.
+bool cameraLintAndDiffRun(const std::string& file) {
+    tool::CameraOptions camera;
+    tool::LintOptions lint;
+    camera.files = lint.files = {file};
+    tool::DiffOptions diff;
+    diff.a = diff.b = file;
+    return tool::camera(camera) == 0 && tool::lint(lint) <= 1 && tool::diff(diff) == 0;
+}
+
 /// Runs works on a file of a kind and keeps what each costs.
 class Measurement {
 public:
@@ -178,6 +188,7 @@ public:
         measure("info of 6.1", [&] { EXPECT_EQ(infoOf(mOld), 0); });
         measure("dump", [&] { EXPECT_EQ(dumpOf(mFile), 0); });
         measure("dump of 6.1", [&] { EXPECT_EQ(dumpOf(mOld), 0); });
+        measure("camera, lint and diff", [&] { EXPECT_TRUE(cameraLintAndDiffRun(mFile)); });
         measure("convert to 6.1", [&] { EXPECT_EQ(convertTo(0, mFile, mOut), 0); });
         measure("convert to 7.5", [&] { EXPECT_EQ(convertTo(5, mFile, mOut), 0); });
         return mCosts;

@@ -13,7 +13,7 @@ import subprocess
 import tempfile
 import unittest
 
-from support import SDK_DATA, SHOT, TOOL, edited, run
+from support import ROOT, SDK_DATA, SHOT, TOOL, edited, run
 
 INCH = 25.4
 MODES = ("twoAngles", "horizontalAngle", "verticalAngle", "focalLength")  # as files number them
@@ -264,6 +264,29 @@ class Frames(Close):
             result = run("camera", "--frames", frames, self.FILE)
             self.assertEqual((result.returncode, result.stdout), (1, ""))
             self.assertIn("1001 to 1010", result.stderr)
+
+    def test_a_keyed_node_above_moves_the_camera_along(self):
+        with open(self.FILE, encoding="utf-8") as stream:
+            text = stream.read()
+        below = text.replace("Objects:  {\n", 'Objects:  {\n\tModel: 50, "Model::rail", "Null" {\n\t}\n\tModel: 51, '
+                             '"Model::head", "Null" {\n\t}\n', 1)
+        below = below.replace('C: "OO",1,0', 'C: "OO",50,0\n\tC: "OO",51,50\n\tC: "OO",1,51', 1)
+        below = below.replace('C: "OP",5,1, "Lcl Translation"', 'C: "OP",5,50, "Lcl Translation"', 1)
+        camera = one(below, "--frames", "1001:1010")
+        self.assertEqual((camera["movedBy"], camera["moves"]), ("rail", True))
+        self.close(camera["frames"][9]["position"], [9, 0, 0])
+        self.assertIsNone(one(text)["movedBy"])
+
+    def test_that_are_too_many_are_refused(self):
+        with open(os.path.join(ROOT, "tests", "data", "lint", "take-without-keys.fbx"), encoding="utf-8") as stream:
+            text = stream.read()
+        stop = next(line for line in text.splitlines() if '"LocalStop"' in line)
+        text = text.replace(stop, stop.rsplit(",", 1)[0] + ",4618615800000000000")
+        self.assertEqual(run("camera", "-", input=text).returncode, 0)
+        for arguments in (("--csv",), ("--frames", "0:2000000")):
+            result = run("camera", *arguments, "-", input=text)
+            self.assertEqual(result.returncode, 1, arguments)
+            self.assertIn("too many", result.stderr)
 
     def test_without_a_take_every_frame_is_alike(self):
         camera = one(scene({"FocalLength": 20.0, "ApertureMode": 3}), "--frames", "5:7")

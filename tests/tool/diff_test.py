@@ -273,6 +273,12 @@ class Forms(Folder):
 
 
 class Failures(Folder):
+    def test_are_none_of_takes_that_claim_billions_of_frames_for_what_stands_still(self):
+        still = scenes.scene(span=(0, 2400000000), keyed=False)
+        self.assertEqual(self.diff(still, still), [])
+        other = scenes.scene(span=(0, 2400000000), keyed=False, camera={"FocalLength": 50.0})
+        self.assertIn("focalLength", [each["what"] for each in self.diff(still, other)])
+
     def test_name_the_file(self):
         missing = os.path.join(self.folder, "missing.fbx")
         for arguments in ((SHOT, missing), (missing, SHOT)):

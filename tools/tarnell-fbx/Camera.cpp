@@ -9,6 +9,7 @@
 #include "CameraOrigins.h"
 #include "Commands.h"
 #include "Csv.h"
+#include "Lines.h"
 #include "SceneFacts.h"
 #include "SceneQueries.h"
 #include "ShowFiles.h"
@@ -23,20 +24,24 @@ struct Range {
     long long first, last;
 };
 
-/// The frames that were asked for, or those of the take. Throws Unreadable where the take has not all of them.
+/// The frames that were asked for, or those of the take. Throws Unreadable where the take has not all of them, or where
+/// too many are to be printed.
 Range rangeOf(const CameraList& list, const CameraOptions& options) {
-    const Range take{list.take.firstFrame, list.take.lastFrame};
-    if (!options.frames)
-        return take;
-    const Range asked{options.frames->first, options.frames->second};
-    if (list.take.exists && (asked.first < take.first || asked.last > take.last))
-        throw Unreadable("frames " + std::to_string(asked.first) + " to " + std::to_string(asked.last) +
-                         " were asked for, and the take has " + std::to_string(take.first) + " to " +
-                         std::to_string(take.last));
+    Range range{list.take.firstFrame, list.take.lastFrame};
+    if (options.frames) {
+        const Range asked{options.frames->first, options.frames->second};
+        if (list.take.exists && (asked.first < range.first || asked.last > range.last))
+            throw Unreadable("frames " + std::to_string(asked.first) + " to " + std::to_string(asked.last) +
+                             " were asked for, and the take has " + std::to_string(range.first) + " to " +
+                             std::to_string(range.last));
+        range = asked;
+    }
     constexpr long long kMostFrames = 1 << 20;
-    if (asked.last - asked.first >= kMostFrames)
-        throw Unreadable("more than " + std::to_string(kMostFrames) + " frames are asked for");
-    return asked;
+    const bool printsAll = options.frames || options.form == Form::csv;
+    if (printsAll && range.last - range.first >= kMostFrames)
+        throw Unreadable("frames " + std::to_string(range.first) + " to " + std::to_string(range.last) +
+                         " are too many to be printed; --frames A:B picks some");
+    return range;
 }
 
 void keepNamed(CameraList& list, const std::string& name) {
@@ -75,22 +80,6 @@ std::string pictureText(const CameraFacts& camera, const CameraMoment& moment) {
     return text + "; gate fit " + gateFitName(camera.gateFit) + " → " + degrees(moment.pictureFovX, moment.pictureFovY);
 }
 
-/// Prints "  Label         text".
-class Lines {
-public:
-    Lines(std::ostream& out, const Terminal& terminal) : mOut(out), mTerminal(terminal) {}
-
-    void line(std::string_view label, const std::string& text) {
-        constexpr std::size_t kColumn = 14;
-        mOut << "  " << mTerminal.paint(Ink::faint, label)
-             << std::string(kColumn - std::min(kColumn, label.size()), ' ') << terminalText(text) << '\n';
-    }
-
-private:
-    std::ostream& mOut;
-    const Terminal& mTerminal;
-};
-
 void printTitle(const CameraFacts& camera, std::ostream& out, const Terminal& terminal) {
     out << terminal.paint(Ink::name, terminalText(camera.name)) << "  " << (camera.stereo ? "stereo, " : "")
         << (camera.orthographic ? "orthographic"
@@ -115,26 +104,15 @@ void printLens(const CameraFacts& camera, const CameraMoment& moment, Lines& lin
     lines.line("Clip planes", significant(moment.nearPlane, 6) + " to " + significant(moment.farPlane, 6) + " cm");
 }
 
-double distance(const Vector3& a, const Vector3& b) { return std::hypot(a[0] - b[0], a[1] - b[1], a[2] - b[2]); }
-
-/// Whether the camera looks at the point of interest, to a degree.
-bool isAhead(const CameraMoment& moment, double away) {
-    constexpr double kCosine = 0.9998;
-    double along = 0.0;
-    for (std::size_t axis = 0; axis < 3; ++axis)
-        along += (moment.interest[axis] - moment.position[axis]) * moment.direction[axis];
-    return along > kCosine * away;
-}
-
 void printPlace(const CameraFacts& camera, const CameraMoment& moment, Lines& lines) {
     lines.line("World", vectorText(moment.position, 3) + " cm, looks " + vectorText(moment.direction, 3));
-    const double away = distance(moment.interest, moment.position);
-    const std::string there = vectorText(moment.interest, 3) + " cm, " + rounded(away, 3) + " cm away";
+    const std::string there =
+        vectorText(moment.interest, 3) + " cm, " + rounded(moment.interestDistance(), 3) + " cm away";
     if (camera.hasTarget) {
         lines.line("Target", inQuotes(camera.target) + " at " + there);
         lines.line("Roll", rounded(moment.roll, 4) + "°");
     } else {
-        lines.line("Interest", there + (isAhead(moment, away) ? "" : ", not where it looks"));
+        lines.line("Interest", there + (moment.looksAtInterest() ? "" : ", not where it looks"));
     }
     constexpr double kTolerance = 1e-4;
     const Vector3& scale = camera.scale;
@@ -163,14 +141,8 @@ void printIdle(const CameraFacts& camera, std::ostream& out, const Terminal& ter
 }
 
 void printChannels(const CameraFacts& camera, std::ostream& out, const Terminal& terminal) {
-    if (camera.channels.empty() && camera.movingParents.empty())
-        return;
-    if (!camera.movingParents.empty()) {
-        std::string parents;
-        for (const std::string& name : camera.movingParents)
-            parents += (parents.empty() ? "" : ", ") + inQuotes(name);
-        out << "  " << terminal.paint(Ink::faint, "Moved along by") << ' ' << parents << '\n';
-    }
+    if (camera.movedBy)
+        out << "  " << terminal.paint(Ink::faint, "Moved along by") << ' ' << inQuotes(*camera.movedBy) << '\n';
     Table table({{"Keys of"},
                  {"Count", Table::Align::right},
                  {"First frame", Table::Align::right},
@@ -341,11 +313,7 @@ void printSpace(const CameraFacts& camera, JsonWriter& json) {
     vector(json, "postRotation", camera.postRotation);
     json.boolean("rotationActive", camera.rotationActive);
     json.text("restDirection", camera.restDirection);
-    json.key("movingParents");
-    json.beginArray();
-    for (const std::string& name : camera.movingParents)
-        json.text(name);
-    json.endArray();
+    textOrNull(json, "movedBy", camera.movedBy.value_or(""), camera.movedBy.has_value());
 }
 
 void printChannels(const CameraFacts& camera, JsonWriter& json) {

@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <unordered_map>
 
 #include "CameraOrigins.h"
 #include "Curves.h"
@@ -30,10 +31,6 @@ std::vector<FbxNode*> cameraNodes(FbxScene& scene) {
             nodes.push_back(each.node);
     }
     return nodes;
-}
-
-double lengthOf(const FbxVector4& vector) {
-    return std::sqrt(vector[0] * vector[0] + vector[1] * vector[1] + vector[2] * vector[2]);
 }
 
 Vector3 unitVector(const FbxVector4& vector) {
@@ -164,12 +161,30 @@ private:
         facts.hasTarget = target != nullptr;
         facts.target = target ? target->GetName() : "";
         addRest(node, facts);
-        for (FbxNode* above = node.GetParent(); above && above->GetParent(); above = above->GetParent()) {
-            const FbxProperty moving[] = {above->LclTranslation, above->LclRotation, above->LclScaling};
-            if (std::any_of(std::begin(moving), std::end(moving),
+        if (const FbxNode* above = keyedFrom(node.GetParent()))
+            facts.movedBy = above->GetName();
+    }
+
+    /// The node or the nearest one above it whose place is keyed. What is known of those on the way stays known: trees
+    /// may be as deep as they like.
+    const FbxNode* keyedFrom(FbxNode* node) const {
+        std::vector<const FbxNode*> way;
+        const FbxNode* keyed = nullptr;
+        for (FbxNode* at = node; at && !keyed; at = at->GetParent()) {
+            const auto known = mKeyedFrom.find(at);
+            if (known != mKeyedFrom.end()) {
+                keyed = known->second;
+                break;
+            }
+            way.push_back(at);
+            const FbxProperty place[] = {at->LclTranslation, at->LclRotation, at->LclScaling};
+            if (std::any_of(std::begin(place), std::end(place),
                             [this](const FbxProperty& property) { return keyCount(property, mTake) > 0; }))
-                facts.movingParents.emplace_back(above->GetName());
+                keyed = at;
         }
+        for (const FbxNode* each : way)
+            mKeyedFrom[each] = keyed;
+        return keyed;
     }
 
     static void addRest(const FbxNode& node, CameraFacts& facts) {
@@ -197,7 +212,21 @@ private:
     const SceneFile& mOpened;
     FbxAnimStack* mTake;
     const TakeFacts& mFacts;
+    mutable std::unordered_map<const FbxNode*, const FbxNode*> mKeyedFrom;
 };
+
+double CameraMoment::interestDistance() const {
+    return std::hypot(interest[0] - position[0], interest[1] - position[1], interest[2] - position[2]);
+}
+
+double CameraMoment::interestAngle() const {
+    constexpr double kDegrees = 57.295779513082320877;
+    const double away = interestDistance();
+    double along = 0.0;
+    for (std::size_t axis = 0; axis < 3; ++axis)
+        along += (interest[axis] - position[axis]) * direction[axis];
+    return away > 0.0 ? std::acos(std::clamp(along / away, -1.0, 1.0)) * kDegrees : 0.0;
+}
 
 CameraMoment CameraFacts::at(double frame) const {
     const auto value = [&](TnFbxCamera::EFbxCameraChannelType channel) {

@@ -37,6 +37,12 @@ struct CameraMoment {
     Vector3 position{};                          ///< in the world, centimetres, Y up
     Vector3 direction{}, up{};                   ///< in the world, unit length
     Vector3 interest{};                          ///< the target's place, or the point of interest
+
+    [[nodiscard]] double interestDistance() const; ///< centimetres
+    /// Between the direction it looks in and the one to the point; 0 at the point itself.
+    [[nodiscard]] double interestAngle() const; ///< degrees
+    /// To a degree.
+    [[nodiscard]] bool looksAtInterest() const { return interestAngle() <= 1.0; }
 };
 
 /// A number that keys drive.
@@ -90,7 +96,7 @@ public:
     Vector3 preRotation{}, postRotation{}; ///< degrees
     bool rotationActive = false;           ///< whether those are in force
     std::string restDirection;             ///< where rotation 0 looks in the parent's space: "−Z"
-    std::vector<std::string> movingParents;
+    std::optional<std::string> movedBy;    ///< the nearest node above it that is keyed
     std::vector<CameraChannel> channels;
     std::vector<IdleValue> idle;
     std::vector<Origin> origins;

@@ -136,6 +136,8 @@ void print(const DiffPage& page, Form form) {
 
 std::string sentenceOf(const Difference& difference) {
     std::string text = difference.what;
+    if (difference.kind == DiffKind::added || difference.kind == DiffKind::removed)
+        return text + ", " + difference.a + difference.b;
     if (!difference.a.empty() || !difference.b.empty())
         text +=
             ": " + (difference.a.empty() ? "" : difference.a + ' ') + (difference.b.empty() ? "" : "→ " + difference.b);

@@ -40,20 +40,6 @@ std::vector<FbxNode*> nodesWithLights(FbxScene& scene) {
     return nodes;
 }
 
-std::vector<DiffMoment> commonMoments(const TakeFacts& a, const TakeFacts& b) {
-    const auto seconds = [](long long frame, double rate) { return static_cast<double>(frame) / rate; };
-    const double start = std::max(seconds(a.firstFrame, a.frameRate), seconds(b.firstFrame, b.frameRate));
-    const double end = std::min(seconds(a.lastFrame, a.frameRate), seconds(b.lastFrame, b.frameRate));
-    constexpr double kTolerance = 1e-3;
-    std::vector<DiffMoment> moments;
-    const double first = std::ceil(start * a.frameRate - kTolerance) + 0.0; // no minus before a zero
-    for (double frame = first; frame <= end * a.frameRate + kTolerance; ++frame)
-        moments.push_back({frame, frame / a.frameRate * b.frameRate});
-    if (moments.empty()) // the takes have nothing in common: their first frames
-        moments.push_back({static_cast<double>(a.firstFrame), static_cast<double>(b.firstFrame)});
-    return moments;
-}
-
 std::string spanText(const TakeFacts& take) {
     const auto seconds = [&take](long long frame) { return rounded(static_cast<double>(frame) / take.frameRate, 4); };
     return "frames " + std::to_string(take.firstFrame) + " to " + std::to_string(take.lastFrame) + " (" +
@@ -166,9 +152,23 @@ DiffSide::DiffSide(const DiffFile& side, const std::string& chosenTake)
         cameraOf[camera.node] = &camera;
 }
 
+DiffMoments::DiffMoments(const TakeFacts& a, const TakeFacts& b)
+    : mFirst{static_cast<double>(a.firstFrame), static_cast<double>(b.firstFrame)}, mStep(b.frameRate / a.frameRate) {
+    const auto seconds = [](long long frame, double rate) { return static_cast<double>(frame) / rate; };
+    const double start = std::max(seconds(a.firstFrame, a.frameRate), seconds(b.firstFrame, b.frameRate));
+    const double end = std::min(seconds(a.lastFrame, a.frameRate), seconds(b.lastFrame, b.frameRate));
+    constexpr double kTolerance = 1e-3;
+    const double first = std::ceil(start * a.frameRate - kTolerance) + 0.0; // no minus before a zero
+    const double last = std::floor(end * a.frameRate + kTolerance);
+    if (last < first)
+        return;
+    mFirst = {first, first * mStep};
+    mCount = static_cast<std::size_t>(last - first) + 1;
+}
+
 Comparison::Comparison(const DiffFile& fileA, const DiffFile& fileB, const DiffSettings& given)
     : a(fileA, given.take), b(fileB, given.take), settings(given),
-      pairs(matchNodes(fileA.opened.scene(), fileB.opened.scene())), moments(commonMoments(a.take, b.take)) {}
+      pairs(matchNodes(fileA.opened.scene(), fileB.opened.scene())), moments(a.take, b.take) {}
 
 bool Comparison::differ(double one, double other) const {
     if (!std::isfinite(one) || !std::isfinite(other))

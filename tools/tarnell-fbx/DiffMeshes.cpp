@@ -142,7 +142,7 @@ private:
 
 std::vector<DiffMoment> momentsOf(const Comparison& comparison) {
     if (!comparison.settings.frames)
-        return {comparison.moments.front()};
+        return {comparison.moments[0]};
     std::vector<DiffMoment> moments;
     for (int frame = comparison.settings.frames->first; frame <= comparison.settings.frames->second; ++frame) {
         const double seconds = static_cast<double>(frame) / comparison.a.take.frameRate;

@@ -27,8 +27,6 @@ bool changes(const TnFbxTransform& object) {
     return false;
 }
 
-double lengthOf(const FbxVector4& vector) { return std::hypot(vector[0], vector[1], vector[2]); }
-
 double distance(const FbxVector4& a, const FbxVector4& b) { return lengthOf({a[0] - b[0], a[1] - b[1], a[2] - b[2]}); }
 
 /// A node in both files: axes without the unit, which scales the tops of the tree when files are brought to
@@ -86,7 +84,7 @@ private:
         const std::size_t count = placed.change() ? mComparison.moments.size() : 1;
         Difference worst{DiffKind::transform, pair.a->GetName(), what, {}, {}, {}, unit, {}, 0};
         for (std::size_t i = 0; i < count; ++i) {
-            const DiffMoment& moment = mComparison.moments[i];
+            const DiffMoment moment = mComparison.moments[i];
             Apart apart = measure(placesAt(placed, moment));
             const bool differs = !(apart.amount <= mComparison.settings.tolerance * apart.size);
             const double amount = *unit == '\0' || *unit == 'c' ? apart.amount : apart.amount * kDegrees;

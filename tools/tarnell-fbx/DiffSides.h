@@ -41,6 +41,24 @@ struct DiffMoment {
     double a, b;
 };
 
+/// The frames that both takes have, or the first one of each where they have none in common. None is kept: a take may
+/// claim any number of them, and where nothing changes the first one is all that is asked for.
+class DiffMoments {
+public:
+    DiffMoments(const TakeFacts& a, const TakeFacts& b);
+
+    [[nodiscard]] std::size_t size() const { return mCount; }
+    [[nodiscard]] DiffMoment operator[](std::size_t index) const {
+        const double frames = static_cast<double>(index);
+        return {mFirst.a + frames, mFirst.b + frames * mStep};
+    }
+
+private:
+    DiffMoment mFirst;
+    double mStep = 1.0; ///< frames of the second file for one of the first
+    std::size_t mCount = 1;
+};
+
 /// Both files, and what was found so far.
 class Comparison {
 public:
@@ -49,7 +67,7 @@ public:
     const DiffSide a, b;
     const DiffSettings& settings;
     std::vector<NodePair> pairs;
-    std::vector<DiffMoment> moments; ///< never empty
+    DiffMoments moments;
     std::vector<Difference> found;
 
     /// Whether two numbers count as different.

@@ -13,6 +13,7 @@
 #include "CacheCheck.h"
 #include "Commands.h"
 #include "Info.h"
+#include "Lines.h"
 #include "SceneFacts.h"
 #include "SceneFile.h"
 #include "ShowFiles.h"
@@ -116,22 +117,6 @@ Facts factsOf(const std::string& file, const SceneFile& opened) {
 }
 
 // ---- For people ----
-
-/// Prints "  Label         text".
-class Lines {
-public:
-    Lines(std::ostream& out, const Terminal& terminal) : mOut(out), mTerminal(terminal) {}
-
-    void line(std::string_view label, const std::string& text) {
-        constexpr std::size_t kColumn = 14;
-        mOut << "  " << mTerminal.paint(Ink::faint, label)
-             << std::string(kColumn - std::min(kColumn, label.size()), ' ') << text << '\n';
-    }
-
-private:
-    std::ostream& mOut;
-    const Terminal& mTerminal;
-};
 
 std::string versionText(int version) {
     const std::string text = std::to_string(version / 1000) + '.' + std::to_string(version / 100 % 10);

@@ -22,11 +22,6 @@ const FbxCamera& attributeOf(const CameraFacts& camera) { return *camera.node->G
 
 bool isPositive(double number) { return std::isfinite(number) && number > 0.0; }
 
-double lengthTo(const CameraMoment& moment) {
-    return std::hypot(moment.interest[0] - moment.position[0], moment.interest[1] - moment.position[1],
-                      moment.interest[2] - moment.position[2]);
-}
-
 } // namespace
 
 void lensOutOfRange(const LintContext& context, LintReport& report) {
@@ -146,19 +141,12 @@ void rollWithoutTarget(const LintContext& context, LintReport& report) {
 }
 
 void interestElsewhere(const LintContext& context, LintReport& report) {
-    constexpr double kCosine = 0.9998, kRadians = 0.017453292519943295769; // about a degree
     for (const CameraFacts& camera : context.cameras.cameras) {
         const CameraMoment moment = firstMoment(context, camera);
-        const double away = lengthTo(moment);
-        double along = 0.0;
-        for (std::size_t axis = 0; axis < 3; ++axis)
-            along += (moment.interest[axis] - moment.position[axis]) * moment.direction[axis];
-        if (camera.hasTarget || !extensions::isStated(attributeOf(camera).InterestPosition) || !(away > 0.0) ||
-            along > kCosine * away)
-            continue;
-        report.add(camera.name, "the point of interest lies " +
-                                    rounded(std::acos(std::clamp(along / away, -1.0, 1.0)) / kRadians, 2) +
-                                    "° off the direction it looks in");
+        if (!camera.hasTarget && extensions::isStated(attributeOf(camera).InterestPosition) &&
+            !moment.looksAtInterest())
+            report.add(camera.name, "the point of interest lies " + rounded(moment.interestAngle(), 2) +
+                                        "° off the direction it looks in");
     }
 }
 

@@ -10,6 +10,7 @@
 
 #include "CameraOrigins.h"
 #include "LintChecks.h"
+#include "Placing.h"
 #include "PropertyValues.h"
 #include "SceneFacts.h"
 #include "Utf8.h"
@@ -24,8 +25,6 @@ bool hasOptics(const LintContext& context) {
            std::any_of(context.nodes.begin(), context.nodes.end(),
                        [](const TreeNode& each) { return each.node->GetLight() != nullptr; });
 }
-
-double lengthOf(const FbxVector4& vector) { return std::hypot(vector[0], vector[1], vector[2]); }
 
 double dotProduct(const FbxVector4& a, const FbxVector4& b) { return a[0] * b[0] + a[1] * b[1] + a[2] * b[2]; }
 

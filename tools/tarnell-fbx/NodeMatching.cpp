@@ -103,38 +103,50 @@ private:
                 byId[extensions::fileIdOf(*node)] = node;
         }
         for (FbxNode* node : mA) {
-            if (mOfA.count(node))
-                continue;
             const auto found = byId.find(extensions::fileIdOf(*node));
-            FbxNode* other = found != byId.end() ? found->second : onlySibling(*node);
-            if (other && !mOfB.count(other) && std::string_view(kindOf(*node)) == kindOf(*other))
-                match(*node, *other);
+            if (found != byId.end())
+                matchIfAlike(*node, found->second);
+        }
+        for (FbxNode* node : mA) {
+            if (!mOfA.count(node))
+                matchIfAlike(*node, onlySibling(*node));
         }
     }
 
+    void matchIfAlike(FbxNode& a, FbxNode* b) {
+        if (b && !mOfA.count(&a) && !mOfB.count(b) && std::string_view(kindOf(a)) == kindOf(*b))
+            match(a, *b);
+    }
+
+    /// What is left below a parent: for each kind the only node, or null where there are several.
+    using LeftByKind = std::map<std::string_view, FbxNode*>;
+
     /// The only node of the kind that is left below the parent's counterpart, where this is the only one here, too.
-    FbxNode* onlySibling(FbxNode& node) const {
+    FbxNode* onlySibling(FbxNode& node) {
         const auto parent = mOfA.find(node.GetParent());
         if (parent == mOfA.end())
             return nullptr;
-        return onlyLeft(*node.GetParent(), kindOf(node), mOfA) ? onlyLeft(*parent->second, kindOf(node), mOfB)
-                                                               : nullptr;
+        const char* kind = kindOf(node);
+        return onlyLeft(*node.GetParent(), kind, mOfA) ? onlyLeft(*parent->second, kind, mOfB) : nullptr;
     }
 
+    /// Asked for after all that match otherwise do, so that what is left is counted once per parent.
     template <class Known>
-    static FbxNode* onlyLeft(FbxNode& parent, std::string_view kind, const Known& known) {
-        FbxNode* only = nullptr;
-        for (int i = 0; i < parent.GetChildCount(); ++i) {
+    FbxNode* onlyLeft(FbxNode& parent, std::string_view kind, const Known& known) {
+        const auto [counted, isNew] = mLeft.try_emplace(&parent);
+        for (int i = 0; isNew && i < parent.GetChildCount(); ++i) {
             FbxNode* child = parent.GetChild(i);
-            if (known.count(child) || kind != kindOf(*child))
+            if (known.count(child))
                 continue;
-            if (only)
-                return nullptr;
-            only = child;
+            const auto [only, isFirst] = counted->second.try_emplace(kindOf(*child), child);
+            if (!isFirst)
+                only->second = nullptr;
         }
-        return only;
+        const auto found = counted->second.find(kind);
+        return found == counted->second.end() ? nullptr : found->second;
     }
 
+    std::unordered_map<const FbxNode*, LeftByKind> mLeft;
     std::vector<FbxNode*> mA, mB;
     std::unordered_map<const FbxNode*, FbxNode*> mOfA, mOfB;
 };

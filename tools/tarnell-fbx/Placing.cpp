@@ -2,6 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 #include "Placing.h"
 
+#include <cmath>
 #include <cstddef>
 
 namespace tool {
@@ -50,5 +51,7 @@ FbxAMatrix placeAt(const TnFbxTransform& object, double frame) {
     place.SetT(vectorAt(TnFbxTransform::kFbxTransformPositionX));
     return place;
 }
+
+double lengthOf(const FbxVector4& vector) { return std::hypot(vector[0], vector[1], vector[2]); }
 
 } // namespace tool

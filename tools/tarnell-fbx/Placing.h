@@ -15,4 +15,6 @@ namespace tool {
 /// Position · rotation · shear · scale at a frame, the right one first.
 FbxAMatrix placeAt(const Tarnell::Fbx::TnFbxTransform& object, double frame);
 
+double lengthOf(const FbxVector4& vector);
+
 } // namespace tool
