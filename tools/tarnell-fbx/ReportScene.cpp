@@ -77,6 +77,7 @@ bool isExact(double rate) { return static_cast<double>(static_cast<float>(rate))
 /// So many places among `count`, evenly spread, the first and the last among them.
 std::vector<int> spread(int wanted, int count) {
     std::vector<int> places;
+    places.reserve(static_cast<std::size_t>(wanted));
     for (int i = 0; i < wanted; ++i)
         places.push_back(wanted < 2 ? 0 : static_cast<int>(static_cast<long long>(i) * (count - 1) / (wanted - 1)));
     return places;
@@ -149,7 +150,8 @@ void ReportScene::boundFrames(const ReportWishes& wishes) {
         first += (mSampleStep - (first % mSampleStep + mSampleStep) % mSampleStep) % mSampleStep;
         first = std::min(first, last);
     }
-    const auto frames = static_cast<std::size_t>((last - first) / mSampleStep + 1);
+    const long long samples = (static_cast<long long>(last) - first) / mSampleStep + 1;
+    const auto frames = static_cast<std::size_t>(samples);
     const std::size_t numbers = std::max(frames * moving * kMostFrames, frames * kMostSamples);
     const auto stride = static_cast<int>((numbers - 1) / (kMostSamples * kMostFrames) + 1);
     mFrames.first = first;
