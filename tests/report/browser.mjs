@@ -117,7 +117,14 @@ test("opens without a complaint, and shows the scene", async () => {
   await page.close();
 });
 
-test("the slider moves the camera to the faithful numbers of the frame", async () => {
+/** What `camera` prints of the first camera, frame by frame. */
+function printed(file, frames) {
+  const text = execFileSync(tool, ["camera", "--json", "--frames", frames, file], { encoding: "utf8" });
+  return JSON.parse(text).cameras[0].frames;
+}
+
+test("the slider moves the camera to the numbers that `camera` prints", async () => {
+  const moments = printed(shot, "1001:1048");
   const [camera] = faithful(shot, "cameras");
   const { page, complaints } = await open(write("shot", shot));
   await page.select("#camera", await page.$eval("#camera option:last-child", (option) => option.value));
@@ -128,6 +135,13 @@ test("the slider moves the camera to the faithful numbers of the frame", async (
     assert.deepEqual(numbersOf(await valueOf(page, "focalLength")), [shownNumber(at(camera.channels.focalLength, place), 4)]);
     assert.equal(await page.$eval("#frame-number", (field) => field.value), String(1001 + place));
 
+    const moment = moments[place];
+    assert.equal(moment.frame, 1001 + place);
+    assert.deepEqual(numbersOf(await valueOf(page, "position")), moment.position.map((value) => shownNumber(value, 3)));
+    assert.deepEqual(numbersOf(await valueOf(page, "direction")), moment.direction.map((value) => shownNumber(value, 4)));
+    assert.deepEqual(numbersOf(await valueOf(page, "filmAngles")), moment.fov.map((value) => shownNumber(value, 3)));
+    assert.deepEqual(numbersOf(await valueOf(page, "pictureAngles")), moment.pictureFov.map((value) => shownNumber(value, 3)));
+    assert.deepEqual(numbersOf(await valueOf(page, "focalLength")), [shownNumber(moment.focalLength, 4)]);
     await assertDrawn(page, camera, place);
   }
   assert.deepEqual(complaints, []);
@@ -155,7 +169,7 @@ test("film and picture meet as the gate fit says", async () => {
   // 1920 × 1080 with a horizontal fit: the picture is as wide as the film
   const expected = [angle(film), angle((film * 1080) / 1920)].map((value) => shownNumber(value, 3));
   assert.deepEqual(numbersOf(await valueOf(page, "pictureAngles")), expected);
-  assert.match(await valueOf(page, "aspect"), /^1\.778; gate fit horizontal$/);
+  assert.match(await valueOf(page, "aspect"), /^1920 × 1080 = 1\.778; gate fit horizontal$/);
   await page.keyboard.press("1");
   const boxes = await page.$$eval(".overlay rect", (all) =>
     Object.fromEntries(all.map((box) => [box.getAttribute("class"), ["width", "height"].map((side) => Number(box.getAttribute(side)))])),

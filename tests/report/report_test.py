@@ -164,6 +164,25 @@ class Reports(unittest.TestCase):
             self.assertEqual((result.returncode, result.stderr), (1, f"tarnell-fbx: {SHOT}: {reason}\n"))
         self.assertFalse(os.path.exists(os.path.join(self.folder, "no.html")))
 
+    def test_findings_are_those_of_lint(self):
+        for file in (SHOT, os.path.join(SDK_DATA, "caches_7400_ascii.fbx")):
+            expected = {}
+            for finding in json.loads(run("lint", "--json", file).stdout)["findings"]:
+                expected.setdefault(finding["rule"], []).append((finding["object"] or "", finding["text"]))
+            shot, = self.report(file)
+            self.assertGreater(len(expected), 0)
+            self.assertEqual({rule["rule"]: [(each["object"], each["text"]) for each in rule["found"]]
+                              for rule in shot.data["findings"]}, expected)
+
+    def test_findings_that_are_many_are_counted(self):
+        names = scenes.document([scenes.model(i + 1, "same", "Null") for i in range(30)] +
+                                [scenes.model(i + 101, f"a/{i}\x07", "Null") for i in range(30)],
+                                [(i + 1, 0) for i in range(30)] + [(i + 101, 0) for i in range(30)])
+        shot, = self.report(self.scene("many.fbx", names))
+        many = [rule for rule in shot.data["findings"] if rule["count"] > 20]
+        self.assertGreater(len(many), 0, shot.data["findings"])
+        self.assertEqual({len(rule["found"]) for rule in many}, {20})
+
     def test_names_stay_names(self):
         shot, = self.report(self.scene("names.fbx", scenes.scene_of_names()))
         self.assertEqual([node["name"] for node in shot.nodes][:len(scenes.NAMES)], scenes.NAMES)

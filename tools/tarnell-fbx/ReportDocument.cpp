@@ -2,11 +2,12 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The document of one file in a report. docs/report.md says what stands in it.
+#include <algorithm>
 #include <array>
-#include <cmath>
 
 #include "Commands.h"
 #include "Info.h"
+#include "LintRules.h"
 #include "ReportPage.h"
 #include "SceneFacts.h"
 
@@ -16,18 +17,8 @@ using namespace Tarnell::Fbx;
 
 namespace {
 
-/// What orthographic cameras see at a zoom of 1, units of the file.
-constexpr double kOrthoWidth = 30.0;
-
-/// Width by height of the picture; where the file fixes one of them, the other is given in parts of it.
-double pictureAspect(const FbxCamera& camera) {
-    const double width = camera.AspectWidth.Get(), height = camera.AspectHeight.Get();
-    const auto mode = camera.AspectRatioMode.Get();
-    const double aspect = mode == FbxCamera::eFixedWidth    ? 1.0 / height
-                          : mode == FbxCamera::eFixedHeight ? width
-                                                            : width / height;
-    return aspect * camera.PixelAspectRatio.Get();
-}
+/// Of a rule that finds more, the rest are counted.
+constexpr int kMostFindings = 20;
 
 class DocumentPrinter {
 public:
@@ -72,6 +63,26 @@ public:
         mJson.endArray();
     }
 
+    /// What `lint` finds, rule by rule.
+    void findings(const std::vector<Finding>& findings) {
+        mJson.key("findings");
+        mJson.beginArray();
+        for (const LintRule& rule : lintRules()) {
+            const auto isIts = [&rule](const Finding& finding) { return finding.rule == &rule; };
+            if (std::none_of(findings.begin(), findings.end(), isIts))
+                continue;
+            mJson.beginObject();
+            mJson.text("rule", rule.id);
+            mJson.text("severity", severityName(rule.severity));
+            mJson.text("reason", rule.reason);
+            mJson.text("remedy", rule.remedy);
+            mJson.integer("count", std::count_if(findings.begin(), findings.end(), isIts));
+            printTexts(rule, findings);
+            mJson.endObject();
+        }
+        mJson.endArray();
+    }
+
     void sentences(const char* key, const std::vector<std::string>& sentences) {
         mJson.key(key);
         mJson.beginArray();
@@ -81,6 +92,21 @@ public:
     }
 
 private:
+    void printTexts(const LintRule& rule, const std::vector<Finding>& findings) {
+        mJson.key("found");
+        mJson.beginArray();
+        int left = kMostFindings;
+        for (const Finding& finding : findings) {
+            if (finding.rule != &rule || left-- <= 0)
+                continue;
+            mJson.beginObject();
+            mJson.text("object", finding.object);
+            mJson.text("text", finding.text);
+            mJson.endObject();
+        }
+        mJson.endArray();
+    }
+
     void print(const ReportNode& node) {
         mJson.text("name", node.tree.node->GetName());
         mJson.text("kind", kindOf(*node.tree.node));
@@ -155,26 +181,49 @@ private:
         mJson.endObject();
     }
 
-    /// What has no place in the value object: how film and picture come together.
+    /// What `camera` says beside the channels.
     void print(const TnFbxCamera& camera, const FbxNode& node) {
-        const auto* attribute = FbxCast<FbxCamera>(node.GetNodeAttribute());
         mJson.key("camera");
         mJson.beginObject();
         mJson.boolean("orthographic", camera.getProjectionType() == TnFbxCamera::kFbxCameraOrthographic);
-        constexpr std::array<const char*, 4> kModes = {"both fields of view", "horizontal field of view",
-                                                       "vertical field of view", "focal length"};
-        mJson.text("drivenBy", kModes[static_cast<std::size_t>(camera.getApertureMode()) % kModes.size()]);
-        if (attribute) {
-            constexpr std::array<const char*, 6> kFits = {"none", "vertical", "horizontal",
-                                                          "fill", "overscan", "stretch"};
-            const auto fit = static_cast<std::size_t>(attribute->GateFit.Get());
-            mJson.text("gateFit", fit < kFits.size() ? kFits[fit] : kFits[0]);
-            mJson.real("pictureAspect", pictureAspect(*attribute));
-            mJson.real("squeeze", attribute->FilmSqueezeRatio.Get());
-            mJson.real("orthoWidth", kOrthoWidth * unit() * attribute->OrthoZoom.Get());
-            mJson.text("target", node.GetTarget() ? node.GetTarget()->GetName() : "");
-        }
+        if (const CameraFacts* facts = mScene.factsOf(node))
+            print(*facts);
         mJson.endObject();
+    }
+
+    void print(const CameraFacts& facts) {
+        mJson.text("drivenBy", driverText(facts.driver));
+        mJson.text("gate", facts.gate);
+        mJson.text("gateFit", gateFitName(facts.gateFit));
+        mJson.key("resolution");
+        mJson.beginArray();
+        for (const double side : facts.resolution)
+            mJson.real(side);
+        mJson.endArray();
+        mJson.real("pictureAspect", facts.pictureAspect);
+        mJson.real("squeeze", facts.squeeze);
+        if (facts.ortho)
+            mJson.real("orthoWidth", facts.ortho->width);
+        if (facts.hasTarget)
+            mJson.text("target", facts.target);
+        mJson.text("restDirection", facts.restDirection);
+        mJson.key("curves");
+        mJson.beginArray();
+        for (const CameraChannel& channel : facts.channels)
+            mJson.text(channel.property + ": " + std::to_string(channel.keys) + (channel.keys == 1 ? " key" : " keys") +
+                       ", frames " + numberText(channel.firstFrame) + " to " + numberText(channel.lastFrame) +
+                       (channel.inForce ? "" : ", not in force"));
+        mJson.endArray();
+        mJson.key("idle");
+        mJson.beginArray();
+        for (const IdleValue& value : facts.idle)
+            mJson.text(value.property + ' ' + value.shortValue + ": " + value.reason);
+        mJson.endArray();
+        mJson.key("origins");
+        mJson.beginArray();
+        for (const Origin& origin : facts.origins)
+            mJson.text(origin.what + ": " + origin.text);
+        mJson.endArray();
     }
 
     void print(const TnFbxLight& light) {
@@ -209,11 +258,6 @@ private:
         return mArrays.add(narrow);
     }
 
-    /// Of the file, centimetres.
-    [[nodiscard]] double unit() const {
-        return mScene.opened().scene().GetGlobalSettings().GetSystemUnit().GetScaleFactor();
-    }
-
     const ReportScene& mScene;
     ReportArrays& mArrays;
     JsonWriter& mJson;
@@ -234,6 +278,7 @@ void printReport(const std::string& file, const ReportScene& scene, ReportArrays
     printer.frames();
     printer.nodes();
     printer.shapes();
+    printer.findings(lintFindings(file, scene.opened()));
     printer.sentences("notes", scene.notes());
     printer.sentences("warnings", scene.warnings());
     json.endObject();

@@ -14,7 +14,6 @@
 
 #include <fbxsdk/extensions/FileFacts.h>
 
-#include "TnFbxError.h"
 #include "TnFbxMesh.h"
 
 namespace tool {
@@ -33,26 +32,6 @@ constexpr double kMostEvaluations = 4e6;
 /// Every moment of moving points reads the file once more.
 constexpr int kMostMoments = 250;
 constexpr std::uintmax_t kMostBytesReadAgain = std::uintmax_t{256} << 20U;
-
-FbxTimeSpan spanOf(FbxScene& scene, FbxAnimStack* stack) {
-    FbxTimeSpan span = stack->GetLocalTimeSpan();
-    for (int layer = 0; layer < stack->GetMemberCount<FbxAnimLayer>(); ++layer) {
-        FbxTimeSpan keyed(FBXSDK_TIME_INFINITE, FBXSDK_TIME_MINUS_INFINITE);
-        if (!scene.GetRootNode()->GetAnimationInterval(keyed, stack, layer))
-            continue;
-        span.Set(std::min(span.GetStart(), keyed.GetStart()), std::max(span.GetStop(), keyed.GetStop()));
-    }
-    return span;
-}
-
-std::pair<int, int> wholeFrames(const FbxTimeSpan& span, double rate) {
-    constexpr double kTolerance = 0.01; // times are rounded to ticks
-    constexpr double kMost = 1e9;
-    const double first = std::floor(span.GetStart().GetSecondDouble() * rate + kTolerance);
-    const double last = std::ceil(span.GetStop().GetSecondDouble() * rate - kTolerance);
-    const int low = static_cast<int>(std::clamp(first, -kMost, kMost));
-    return {low, std::max(low, static_cast<int>(std::clamp(last, -kMost, kMost)))};
-}
 
 /// The attribute by which the library sorts nodes into its kinds.
 FbxNodeAttribute::EType typeOf(const FbxNode& node) {
@@ -98,6 +77,7 @@ bool isExact(double rate) { return static_cast<double>(static_cast<float>(rate))
 /// So many places among `count`, evenly spread, the first and the last among them.
 std::vector<int> spread(int wanted, int count) {
     std::vector<int> places;
+    places.reserve(static_cast<std::size_t>(wanted));
     for (int i = 0; i < wanted; ++i)
         places.push_back(wanted < 2 ? 0 : static_cast<int>(static_cast<long long>(i) * (count - 1) / (wanted - 1)));
     return places;
@@ -118,10 +98,7 @@ bool areSame(const std::vector<Point>& a, const std::vector<Point>& b) {
 
 ReportScene::ReportScene(const std::string& file, const ReportWishes& wishes) : mFile(file), mOpened(file) {
     chooseFrames(wishes);
-    mInfo.setFileName(file);
-    mInfo.setFidelity(kFbxFidelityFaithful);
-    mInfo.setAnimationStackName(wishes.take);
-    mInfo.setGlobalTransform(true);
+    mInfo = faithfulInfo(file, wishes.take);
     mInfo.setTransformPoints(false); // the transforms of their nodes move them
     readEvery(mSampleStep, mFrames.first);
     mTransforms = read<TnFbxTransform>(&Tarnell::Fbx::Fbx::getTransforms);
@@ -130,6 +107,7 @@ ReportScene::ReportScene(const std::string& file, const ReportWishes& wishes) : 
     readOneMoment(mFrames.first);
     mNulls = read<TnFbxNull>(&Tarnell::Fbx::Fbx::getNulls);
     linkNodes();
+    gatherCameras(wishes.take);
     boundFrames(wishes);
     readShapes();
 }
@@ -137,14 +115,12 @@ ReportScene::ReportScene(const std::string& file, const ReportWishes& wishes) : 
 /// The frames of the take, before any is read.
 void ReportScene::chooseFrames(const ReportWishes& wishes) {
     FbxAnimStack* stack = mOpened.chooseTake(wishes.take);
-    mFrames.rate = mOpened.frameRate();
-    std::pair<int, int> range{0, 0};
-    if (stack) {
-        mTake = stack->GetName();
-        range = wholeFrames(spanOf(mOpened.scene(), stack), mFrames.rate);
-    }
-    mFrames.first = range.first;
-    mFrames.count = range.second - range.first + 1;
+    const TakeFacts take = takeFacts(mOpened, stack);
+    mTake = take.name;
+    mFrames.rate = take.frameRate;
+    constexpr long long kMost = 1'000'000'000;
+    mFrames.first = static_cast<int>(std::clamp(take.firstFrame, -kMost, kMost));
+    mFrames.count = static_cast<int>(std::clamp(take.lastFrame, -kMost, kMost)) - mFrames.first + 1;
     const double nodes = std::max(1, mOpened.scene().GetNodeCount());
     mSampleStep = powerOfTwoFrom(static_cast<int>(std::min(std::ceil(mFrames.count * nodes / kMostEvaluations), 1e9)));
 }
@@ -174,7 +150,8 @@ void ReportScene::boundFrames(const ReportWishes& wishes) {
         first += (mSampleStep - (first % mSampleStep + mSampleStep) % mSampleStep) % mSampleStep;
         first = std::min(first, last);
     }
-    const auto frames = static_cast<std::size_t>((last - first) / mSampleStep + 1);
+    const long long samples = (static_cast<long long>(last) - first) / mSampleStep + 1;
+    const auto frames = static_cast<std::size_t>(samples);
     const std::size_t numbers = std::max(frames * moving * kMostFrames, frames * kMostSamples);
     const auto stride = static_cast<int>((numbers - 1) / (kMostSamples * kMostFrames) + 1);
     mFrames.first = first;
@@ -187,17 +164,12 @@ void ReportScene::boundFrames(const ReportWishes& wishes) {
 
 template <class Object>
 ReportScene::Objects<Object> ReportScene::read(Reader<Object> reader) {
-    Object* made = nullptr;
-    Objects<Object> objects;
-    const bool complete = (Tarnell::Fbx::Fbx().*reader)(mInfo, &made, objects.count);
-    objects.array.reset(made);
-    if (!complete)
-        throw Unreadable(lastError());
-    for (const std::string& warning : lastWarnings()) {
-        if (std::find(mWarnings.begin(), mWarnings.end(), warning) == mWarnings.end())
+    FaithfulObjects<Object> read = readFaithfully<Object>(mInfo, reader);
+    for (const std::string& warning : read.warnings) {
+        if (mKnownWarnings.insert(warning).second)
             mWarnings.push_back(warning);
     }
-    return objects;
+    return {std::move(read.objects), read.count};
 }
 
 void ReportScene::readOneMoment(int frame) {
@@ -213,10 +185,9 @@ void ReportScene::readEvery(int step, int frame) {
 /// The next object of a kind, which is what the node carries.
 template <class Object>
 Object* ReportScene::next(Objects<Object>& objects, const FbxNode& node) {
-    if (objects.next == objects.count ||
-        objects.array[static_cast<std::size_t>(objects.next)].getName() != node.GetName())
+    if (objects.next == objects.count || objects.array.get()[objects.next].getName() != node.GetName())
         throw Unreadable(std::string("its objects cannot be told apart: ") + node.GetName());
-    return &objects.array[static_cast<std::size_t>(objects.next++)];
+    return objects.array.get() + objects.next++;
 }
 
 void ReportScene::linkNodes() {
@@ -240,12 +211,29 @@ void ReportScene::linkNodes() {
     }
 }
 
+void ReportScene::gatherCameras(const std::string& take) {
+    if (mCameras.count == 0)
+        return;
+    try {
+        CameraList list = camerasOf(mFile, mOpened, take);
+        for (CameraFacts& facts : list.cameras)
+            mCameraFacts.emplace(facts.node, std::move(facts));
+    } catch (const Unreadable& error) { // of clips that are read in part only
+        mWarnings.emplace_back(error.what());
+    }
+}
+
+const CameraFacts* ReportScene::factsOf(const FbxNode& node) const {
+    const auto found = mCameraFacts.find(&node);
+    return found == mCameraFacts.end() ? nullptr : &found->second;
+}
+
 /// Triangles, as many of each mesh as it has of all.
 void ReportScene::thinShapes(const Objects<TnFbxMesh>& meshes) {
     std::size_t triangles = 0, thinned = 0;
     int dropped = 0;
-    for (int i = 0; i < meshes.count; ++i) {
-        mShapes.push_back({triangulated(meshes.array[static_cast<std::size_t>(i)]), {}});
+    for (std::size_t i = 0; i < meshes.count; ++i) {
+        mShapes.push_back({triangulated(meshes.array.get()[i]), {}});
         triangles += mShapes.back().mesh.triangleCount;
         dropped += mShapes.back().mesh.droppedPolygons;
     }
@@ -253,8 +241,8 @@ void ReportScene::thinShapes(const Objects<TnFbxMesh>& meshes) {
         ReportShape& shape = mShapes[i];
         const double share = static_cast<double>(shape.mesh.triangleCount) / static_cast<double>(triangles);
         if (triangles > kMostTriangles)
-            thin(shape.mesh, pointsOf(meshes.array[i]), static_cast<std::size_t>(share * kMostTriangles));
-        shape.sets.push_back(chosen(meshes.array[i], shape.mesh.kept));
+            thin(shape.mesh, pointsOf(meshes.array.get()[i]), static_cast<std::size_t>(share * kMostTriangles));
+        shape.sets.push_back(chosen(meshes.array.get()[i], shape.mesh.kept));
         thinned += shape.mesh.isThinned() ? 1U : 0U;
     }
     if (thinned > 0)
@@ -288,8 +276,8 @@ void ReportScene::readMovingPoints(const std::vector<int>& wanted) {
     for (std::size_t moment = 1; moment < wanted.size(); ++moment) {
         readOneMoment(mFrames.at(wanted[moment]));
         const Objects<TnFbxMesh> meshes = read<TnFbxMesh>(&Tarnell::Fbx::Fbx::getMeshes);
-        for (std::size_t i = 0; i < mShapes.size() && i < static_cast<std::size_t>(meshes.count); ++i)
-            mShapes[i].sets.push_back(chosen(meshes.array[i], mShapes[i].mesh.kept));
+        for (std::size_t i = 0; i < mShapes.size() && i < meshes.count; ++i)
+            mShapes[i].sets.push_back(chosen(meshes.array.get()[i], mShapes[i].mesh.kept));
     }
     bool moving = false;
     for (ReportShape& shape : mShapes) {

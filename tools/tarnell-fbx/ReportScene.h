@@ -7,20 +7,22 @@
 
 #include <memory>
 #include <optional>
+#include <set>
 #include <string>
+#include <unordered_map>
 #include <utility>
 #include <vector>
 
+#include "CameraFacts.h"
+#include "FaithfulRead.h"
 #include "ReportMesh.h"
 #include "SceneFile.h"
 #include "SceneQueries.h"
 
-#include "Fbx.h"
 #include "TnFbxCamera.h"
 #include "TnFbxLight.h"
 #include "TnFbxMesh.h"
 #include "TnFbxNull.h"
-#include "TnFbxReadInfo.h"
 
 namespace tool {
 
@@ -61,6 +63,8 @@ public:
 
     [[nodiscard]] const SceneFile& opened() const { return mOpened; }
     [[nodiscard]] const std::string& take() const { return mTake; }
+    /// What is said of a camera; null where that could not be gathered.
+    [[nodiscard]] const CameraFacts* factsOf(const FbxNode& node) const;
     [[nodiscard]] const ReportFrames& frames() const { return mFrames; }
     /// Frames of the file's rate between two that channels have samples of.
     [[nodiscard]] int sampleStep() const { return mSampleStep; }
@@ -76,9 +80,8 @@ public:
 private:
     template <class Object>
     struct Objects {
-        std::unique_ptr<Object[]> array;
-        int count = 0;
-        int next = 0;
+        std::shared_ptr<Object[]> array;
+        std::size_t count = 0, next = 0;
     };
     template <class Object>
     using Reader = bool (Tarnell::Fbx::Fbx::*)(Tarnell::Fbx::TnFbxReadInfo&, Object**, int&) const;
@@ -97,11 +100,13 @@ private:
     void readShapes();
     void readMovingPoints(const std::vector<int>& wanted);
     void thinShapes(const Objects<Tarnell::Fbx::TnFbxMesh>& meshes);
+    void gatherCameras(const std::string& take);
     void note(const std::string& sentence) { mNotes.push_back(sentence); }
 
     std::string mFile;
     SceneFile mOpened;
     std::string mTake;
+    std::unordered_map<const FbxNode*, CameraFacts> mCameraFacts;
     Tarnell::Fbx::TnFbxReadInfo mInfo;
     int mSampleStep = 1;
     ReportFrames mFrames;
@@ -113,6 +118,7 @@ private:
     std::vector<ReportShape> mShapes;
     std::vector<int> mShapeFrames;
     std::vector<std::string> mWarnings, mNotes;
+    std::set<std::string> mKnownWarnings; ///< each kind of object brings those of the file again
 };
 
 } // namespace tool

@@ -6,16 +6,35 @@
 /** A number that never changes (null: it is not finite), or where the array of the frames' numbers begins. */
 export type ChannelData = number | null | { at: number };
 
+/** What `tarnell-fbx camera` says; all but the projection is missing where that could not be gathered. */
 export interface CameraData {
   orthographic: boolean;
-  drivenBy: string;
+  drivenBy?: string;
+  /** The name of the film back, if it has one. */
+  gate?: string;
   gateFit?: string;
-  /** Of the picture; nothing sensible where the picture is the film. */
+  resolution?: (number | null)[];
+  /** Of the picture; 0 where the picture is the film. */
   pictureAspect?: number | null;
   squeeze?: number | null;
   /** Of the picture of an orthographic camera, centimetres. */
   orthoWidth?: number | null;
   target?: string;
+  /** Where rotation 0 looks in the space of the parent. */
+  restDirection?: string;
+  curves?: string[];
+  idle?: string[];
+  origins?: string[];
+}
+
+/** What `tarnell-fbx lint` finds by one rule. */
+export interface FindingData {
+  rule: string;
+  severity: "note" | "warning" | "error";
+  reason: string;
+  remedy: string;
+  count: number;
+  found: { object: string; text: string }[];
 }
 
 export interface NodeData {
@@ -65,6 +84,7 @@ export interface ShotData {
   shapeFrames: number[];
   nodes: NodeData[];
   meshes: MeshData[];
+  findings: FindingData[];
   notes: string[];
   warnings: string[];
 }

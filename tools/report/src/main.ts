@@ -9,7 +9,7 @@ import type { Shot } from "./data.ts";
 import { ObjectList } from "./objects.ts";
 import { Store } from "./store.ts";
 import type { Visible } from "./store.ts";
-import { ValueTable, cameraTable, fileFacts, findings, meshTable, notes } from "./tables.ts";
+import { ValueTable, cameraTable, explanation, fileFacts, findings, meshTable, notes } from "./tables.ts";
 import { make, shown } from "./text.ts";
 import { TimeBar } from "./timebar.ts";
 import { View } from "./view.ts";
@@ -62,6 +62,7 @@ class Page {
   private readonly help = keyHelp();
   private readonly title = make("h1");
   private readonly cameraPicker = make("select", { id: "camera", "aria-label": "Look through" });
+  private readonly origins = make("div");
   private readonly sections = make("div", { class: "sections" });
 
   constructor(root: HTMLElement, private readonly shots: (() => Shot)[], first: Shot) {
@@ -81,7 +82,7 @@ class Page {
           "div",
           { class: "panels" },
           section("Objects", objects.element),
-          section("Values", values.element),
+          section("Values", values.element, this.origins),
           section("Curves", this.curves.element),
           this.sections,
         ),
@@ -90,6 +91,7 @@ class Page {
     );
     this.store.listen((change) => {
       if (change === "shot") this.open();
+      if (change !== "frame") this.explain();
       if (change === "view" || change === "shot") this.cameraPicker.value = String(this.store.camera);
     });
     this.cameraPicker.addEventListener("change", () => this.store.lookThrough(Number(this.cameraPicker.value)));
@@ -140,6 +142,11 @@ class Page {
       section("Meshes", meshTable(this.store)),
       section("File", fileFacts(this.store)),
     );
+  }
+
+  private explain(): void {
+    const text = explanation(this.store.node(this.store.selected));
+    this.origins.replaceChildren(...(text ? [text] : []));
   }
 
   private key(event: KeyboardEvent): void {

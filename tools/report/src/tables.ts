@@ -3,7 +3,7 @@
 //
 // What the page says in words and numbers.
 
-import type { NodeData } from "./data.ts";
+import type { FindingData, NodeData } from "./data.ts";
 import { MILLIMETRES_PER_INCH, opticsOf } from "./optics.ts";
 import { directionOf, positionOf } from "./placement.ts";
 import type { Store } from "./store.ts";
@@ -43,7 +43,14 @@ function degrees(width: number, height: number): string {
 }
 
 function drivesWhat(node: NodeData): string {
-  return node.camera?.orthographic ? "orthographic" : `perspective, lens driven by ${node.camera?.drivenBy}`;
+  const driver = node.camera?.drivenBy;
+  return node.camera?.orthographic ? "orthographic" : `perspective${driver ? `, lens driven by ${driver}` : ""}`;
+}
+
+/** "960 × 540 = ", if the file has a resolution. */
+function resolutionOf(node: NodeData): string {
+  const [width, height] = node.camera?.resolution ?? [];
+  return width && height && node.camera?.pictureAspect ? `${number(width)} × ${number(height)} = ` : "";
 }
 
 function cameraRows(store: Store, node: NodeData): Row[] {
@@ -63,13 +70,14 @@ function cameraRows(store: Store, node: NodeData): Row[] {
     {
       key: "film",
       label: "Film back",
-      value: `${number(mm.width)} × ${number(mm.height)} mm = ${number(optics.film.width, 5)} × ${number(optics.film.height, 5)} in`,
+      value: `${camera?.gate ? `${camera.gate}: ` : ""}${number(mm.width)} × ${number(mm.height)} mm = ${number(optics.film.width, 5)} × ${number(optics.film.height, 5)} in`,
     },
     { key: "offset", label: "Film offset", value: `${number(optics.offset.x, 5)}, ${number(optics.offset.y, 5)} in` },
-    { key: "aspect", label: "Picture aspect", value: `${number(optics.pictureAspect)}; gate fit ${camera?.gateFit ?? "none"}` },
+    { key: "aspect", label: "Picture aspect", value: `${resolutionOf(node)}${number(optics.pictureAspect)}; gate fit ${camera?.gateFit ?? "none"}` },
     { key: "squeeze", label: "Squeeze", value: number(camera?.squeeze) },
     { key: "planes", label: "Clip planes", value: `${number(optics.near)} and ${number(optics.far)} cm` },
-    ...(camera?.target ? [{ key: "target", label: "Aims at", value: shown(camera.target) }] : []),
+    ...(camera?.target !== undefined ? [{ key: "target", label: "Aims at", value: shown(camera.target) }] : []),
+    ...(camera?.restDirection ? [{ key: "rest", label: "Rotation 0", value: `looks along ${camera.restDirection}` }] : []),
   ];
 }
 
@@ -125,7 +133,7 @@ export function cameraTable(store: Store): HTMLElement {
   const rows = store.cameras().map((index): Cell[] => {
     const node = store.node(index)!;
     const optics = opticsOf(shot, node, 0);
-    const animated = Object.keys(node.channels).filter((channel) => shot.isAnimated(node, channel));
+    const curves = node.camera?.curves ?? [];
     const look = make("button", { type: "button", class: "link" }, nameText(node.name));
     look.addEventListener("click", () => store.lookThrough(index));
     return [
@@ -134,11 +142,11 @@ export function cameraTable(store: Store): HTMLElement {
       `${number(optics.film.width * MILLIMETRES_PER_INCH, 2)} × ${number(optics.film.height * MILLIMETRES_PER_INCH, 2)} mm`,
       optics.orthographic ? "—" : degrees(optics.pictureAngles.width, optics.pictureAngles.height),
       number(optics.pictureAspect),
-      animated.length > 0 ? counted(animated.length, "channel", "channels") : "static",
+      curves.length > 0 ? list(curves.map(shown)) : "static",
     ];
   });
   if (rows.length === 0) return make("p", { class: "empty" }, "The file has no cameras.");
-  return table("Cameras", ["Camera", "Lens", "Film back", "View of picture", "Aspect", "Animated"], rows);
+  return table("Cameras", ["Camera", "Lens", "Film back", "View of picture", "Aspect", "Curves in the file"], rows);
 }
 
 export function fileFacts(store: Store): HTMLElement {
@@ -177,15 +185,34 @@ function list(sentences: Cell[]): HTMLElement {
   return make("ul", {}, ...sentences.map((sentence) => make("li", {}, sentence)));
 }
 
-/** What reading noticed, what was repaired, caches that cannot be used. */
+function finding(rule: FindingData): HTMLElement {
+  const more = rule.count - rule.found.length;
+  const objects = rule.found.map(({ object, text }) => make("li", {}, ...(object ? [nameText(object), ": "] : []), shown(text)));
+  return make(
+    "li",
+    { class: `finding ${rule.severity}` },
+    make("strong", {}, rule.severity),
+    ` ${rule.rule} `,
+    make("ul", {}, ...objects, ...(more > 0 ? [make("li", {}, `… and ${more} more; lint --json has all`)] : [])),
+    make("p", { class: "quiet" }, `${rule.reason} → ${rule.remedy}`),
+  );
+}
+
+/** What the rules of `lint` find, the worst first, and what reading noticed. */
 export function findings(store: Store): HTMLElement {
-  const { info, warnings } = store.shot.data;
-  const sentences: Cell[] = [
-    ...info.cacheFaults.map((fault) => `“${shown(fault.mesh)}” cannot use its point cache: ${shown(fault.reason)}`),
-    ...warnings.map(shown),
-    ...info.repaired.map((repair) => `Repaired: ${shown(repair)}`),
-  ];
-  return sentences.length > 0 ? list(sentences) : make("p", { class: "empty" }, "Nothing was found.");
+  const { findings: all, warnings } = store.shot.data;
+  const worst = ["error", "warning", "note"];
+  const ordered = [...all].sort((a, b) => worst.indexOf(a.severity) - worst.indexOf(b.severity));
+  if (all.length + warnings.length === 0) return make("p", { class: "empty" }, "Nothing was found.");
+  return make("ul", { class: "findings" }, ...ordered.map(finding), ...warnings.map((warning) => make("li", {}, shown(warning))));
+}
+
+/** Where the numbers of the selected camera come from, and what the file says that has no say. */
+export function explanation(node: NodeData | undefined): HTMLElement | undefined {
+  const { origins = [], idle = [] } = node?.camera ?? {};
+  if (origins.length + idle.length === 0) return undefined;
+  const idleList = idle.length > 0 ? [make("p", {}, "In the file, not in force:"), list(idle.map(shown))] : [];
+  return make("details", {}, make("summary", {}, "Where these numbers come from"), list(origins.map(shown)), ...idleList);
 }
 
 export function notes(store: Store): HTMLElement | undefined {

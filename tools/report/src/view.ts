@@ -291,6 +291,8 @@ export class View {
     const node = this.store.node(this.store.camera);
     if (!node?.camera) {
       this.status.textContent = "Drag to turn, right button to move, wheel to zoom.";
+      delete this.status.dataset["position"];
+      delete this.status.dataset["direction"];
       return;
     }
     this.aim(1);
