@@ -85,6 +85,8 @@ private:
         Difference worst{DiffKind::transform, pair.a->GetName(), what, {}, {}, {}, unit, {}, 0};
         for (std::size_t i = 0; i < count; ++i) {
             const DiffMoment moment = mComparison.moments[i];
+            if (hasSameValues(placed, moment))
+                continue;
             Apart apart = measure(placesAt(placed, moment));
             const bool differs = !(apart.amount <= mComparison.settings.tolerance * apart.size);
             const double amount = *unit == '\0' || *unit == 'c' ? apart.amount : apart.amount * kDegrees;
@@ -97,6 +99,18 @@ private:
         }
         if (worst.amount)
             found.push_back(std::move(worst));
+    }
+
+    /// Most frames of most clips: nothing has to be worked out then.
+    bool hasSameValues(const PlacedPair& placed, const DiffMoment& moment) const {
+        bool same = mComparison.a.unit == mComparison.b.unit &&
+                    placed.a->getTransformRotationOrder() == placed.b->getTransformRotationOrder();
+        for (int i = 0; same && i <= TnFbxTransform::kFbxTransformSkewZ; ++i) {
+            const auto channel = static_cast<TnFbxTransform::EFbxTransformChannelType>(i);
+            same = placed.a->getTransformValueAt(channel, static_cast<float>(moment.a)) ==
+                   placed.b->getTransformValueAt(channel, static_cast<float>(moment.b));
+        }
+        return same;
     }
 
     Places placesAt(const PlacedPair& placed, const DiffMoment& moment) const {
