@@ -67,6 +67,33 @@ TEST(CacheFacts, ListsAThousandFaultsAndSaysThatThereAreMore) {
     EXPECT_THAT(facts.faults.back().reason, testing::EndsWith("further ones are not listed"));
 }
 
+TEST(CacheFacts, NamesAHeaderThatIsCutOff) {
+    const support::TemporaryFolder folder;
+
+    const auto facts = factsOf(folder.write("short.pc2", std::string("POINTCACHE2\0\1\0\0\0", 16)));
+
+    ASSERT_EQ(facts.faults.size(), 1U);
+    EXPECT_EQ(facts.faults.front().offset, 16U);
+    EXPECT_EQ(facts.format, FbxCache::eMaxPointCacheV2);
+}
+
+TEST(CacheFacts, OfTheFileOfAFrameAreThoseOfItsCache) {
+    const std::vector<double> point = {1, 2, 3};
+    const support::TemporaryFolder folder;
+    folder.write("ball.xml", "<Autodesk_Cache_File><cacheType Type=\"OneFilePerFrame\" Format=\"mcc\"/>"
+                             "<time Range=\"250-250\"/><cacheTimePerFrame TimePerFrame=\"250\"/><Channels>"
+                             "<channel0 ChannelName=\"a\" StartTime=\"250\" EndTime=\"250\"/></Channels>"
+                             "</Autodesk_Cache_File>");
+
+    const auto facts = factsOf(folder.write("ballFrame1.mc", dataOf({{"a", point}})));
+
+    EXPECT_EQ(facts.description, folder.file("ball.xml"));
+    EXPECT_FALSE(facts.oneFile);
+    ASSERT_EQ(facts.samples.size(), 1U);
+    EXPECT_EQ(facts.samples.front().frame, 1.0);
+    EXPECT_TRUE(facts.faults.empty());
+}
+
 TEST(CacheFacts, ShortensLongNamesInFaultsOnly) {
     const std::vector<double> point = {kNaN, 2, 3};
     const std::string longName(1'000'000, 'n');
