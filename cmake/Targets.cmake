@@ -19,7 +19,15 @@ function(tarnell_precompile_standard_headers name)
   endif()
 endfunction()
 
-# Lets every basic block of the target call a function, by which tests/growth counts work.
+# Lets every basic block of the target call a function, by which tests/growth counts work. In other programs the function
+# does nothing.
+if(TARNELL_FBX_COUNT_STEPS)
+  set(source "${CMAKE_CURRENT_BINARY_DIR}/uncounted_steps.cpp")
+  file(CONFIGURE OUTPUT "${source}" CONTENT "extern \"C\" __attribute__((visibility(\"hidden\"))) void __sanitizer_cov_trace_pc() {}\n")
+  add_library(tarnell_uncounted_steps STATIC "${source}")
+  set_target_properties(tarnell_uncounted_steps PROPERTIES POSITION_INDEPENDENT_CODE ON)
+  target_link_libraries(tarnell_settings INTERFACE tarnell_uncounted_steps)
+endif()
 function(tarnell_count_steps name)
   if(TARNELL_FBX_COUNT_STEPS)
     target_compile_options(${name} PRIVATE -fsanitize-coverage=trace-pc)

@@ -36,7 +36,7 @@ function hash(text) {
 function literals(text) {
   const pieces = [];
   for (let at = 0; at < text.length; at += 8000) pieces.push(text.slice(at, at + 8000));
-  return pieces.map((piece) => `    R"page(${piece})page",`).join("\n");
+  return pieces.map((piece) => `    R"page(${piece})page"sv,`).join("\n");
 }
 
 /** The licences of what the page has inside, as their terms ask for. */
@@ -66,6 +66,8 @@ writeFileSync(
 
 namespace tool {
 namespace {
+
+using namespace std::string_view_literals;
 
 constexpr auto kHead = std::to_array<std::string_view>({
 ${literals(head)}
