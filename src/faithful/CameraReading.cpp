@@ -58,7 +58,7 @@ FbxVector4 minus(const FbxVector4& a, const FbxVector4& b) { return {a[0] - b[0]
 /// What a camera looks at, in the world.
 class Aim {
 public:
-    explicit Aim(FbxNode& node) : mNode(node), mCamera(*node.GetCamera()) {}
+    Aim(const Scene& scene, FbxNode& node) : mNode(node), mCamera(*node.GetCamera()), mUnit(scene.unit()) {}
 
     bool hasTarget() const { return mNode.GetTarget() != nullptr; }
 
@@ -66,7 +66,11 @@ public:
         if (FbxNode* target = mNode.GetTarget()) {
             return worldMatrix(*target, time).GetT();
         }
-        return asVector(mCamera.InterestPosition.EvaluateValue(time));
+        FbxVector4 point = asVector(mCamera.InterestPosition.EvaluateValue(time));
+        for (int i = 0; i < 3; ++i) {
+            point[i] *= mUnit; // nodes were scaled to centimetres, and this is none
+        }
+        return point;
     }
 
     /// Toward the node above it where there is one.
@@ -86,10 +90,11 @@ public:
 private:
     FbxNode& mNode;
     FbxCamera& mCamera;
+    double mUnit;
 };
 
 Placement cameraPlacement(Scene& scene, FbxNode& node, const TnFbxReadInfo& info) {
-    const Aim aim(node);
+    const Aim aim(scene, node);
     const bool global = info.getGlobalTransform();
     const bool looksAt = aim.hasTarget() || info.getComputeCameraRotation();
     Placement placement = placementOf(scene, node, global);
@@ -136,7 +141,7 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxCamer
     const auto mode = apertureModeOf(source);
     camera.setApertureMode(mode);
 
-    const Aim aim(node);
+    const Aim aim(scene, node);
     const bool global = info.getGlobalTransform();
     const auto valuesAt = [&](const FbxTime& time) -> std::array<double, kChannels> {
         const AimValues looks = aimAt(aim, node, global, time);

@@ -90,7 +90,11 @@ bool Scene::load(const TnFbxReadInfo& info) {
     if (!import(*mManager, *mScene, mFileName)) {
         return false;
     }
+    const fbxsdk::FbxGlobalSettings& settings = mScene->GetGlobalSettings();
+    const double unit = settings.GetSystemUnit().GetScaleFactor();
     detail::convertToCentimetres(*mScene);
+    const double left = settings.GetSystemUnit().GetScaleFactor(); // a unit that is no number
+    mUnit = left < 1.0 || left > 1.0 || std::isnan(left) ? 1.0 : unit;
     detail::convertToYUp(*mScene);
     return selectStack(info.getAimationStackName()) && selectFrames(info);
 }

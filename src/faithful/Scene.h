@@ -32,6 +32,8 @@ public:
     fbxsdk::FbxScene& scene() const { return *mScene; }
     const std::string& fileName() const { return mFileName; }
     const Timeline& timeline() const { return mTimeline; }
+    /// Of the file, in centimetres, which the scene counts in.
+    double unit() const { return mUnit; }
     /// Frames per second of the file, exactly.
     double fileRate() const { return mFileRate; }
     /// The frame of the static values, and its time.
@@ -65,6 +67,7 @@ private:
     fbxsdk::FbxAnimStack* mStack = nullptr; // null: nothing is animated
     std::vector<fbxsdk::FbxAnimLayer*> mLayers;
     Timeline mTimeline;
+    double mUnit = 1.0;
     double mFileRate = 24.0;
     float mFrame = 0.0f;
     fbxsdk::FbxTime mNow;

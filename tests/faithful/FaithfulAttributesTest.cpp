@@ -100,6 +100,20 @@ TEST(FaithfulCamera, IsInTheWorldBelowAParent) {
     EXPECT_THAT(positionOf(readFaithfully<TnFbxCamera>(scene)["camera"]), isNear({6.0f, 0.0f, 0.0f}));
 }
 
+TEST(FaithfulCamera, LooksAtItsInterestInCentimetres) {
+    TestScene scene(0, 2);
+    scene.scene->GetGlobalSettings().SetSystemUnit(fbxsdk::FbxSystemUnit(/*pScaleFactor*/ 100.0));
+    fbxsdk::FbxCamera& source = addCamera(scene);
+    source.GetNode()->LclTranslation.Set(fbxsdk::FbxDouble3(1.0, 2.0, 3.0));
+    source.InterestPosition.Set(fbxsdk::FbxDouble3(4.0, 2.0, 3.0));
+    scene.key(source.InterestPosition, "Y", {{0, 2.0f}, {2, 6.0f}});
+    auto read = readFaithfully<TnFbxCamera>(scene);
+    TnFbxCamera& camera = read["camera"];
+    EXPECT_NEAR(valueOf(camera, TnFbxCamera::kFbxCameraLookAtPositionX), 400.0, 1e-3);
+    EXPECT_NEAR(static_cast<double>(camera.getTransformValue(TnFbxTransform::kFbxTransformPositionX)), 100.0, 1e-3);
+    EXPECT_THAT(samplesOf(camera, TnFbxCamera::kFbxCameraLookAtPositionY), isNear({200.0f, 400.0f, 600.0f}));
+}
+
 TEST(FaithfulCamera, TurnsTowardItsTargetAndRolls) {
     TestScene scene(0, 4);
     fbxsdk::FbxCamera& source = addCamera(scene);

@@ -116,7 +116,6 @@ public:
         facts.name = node.GetName();
         facts.node = &node;
         facts.mFrameRate = mFacts.frameRate;
-        facts.mUnit = unit();
         facts.mValues = std::move(values);
         const FbxCamera& camera = *node.GetCamera();
         facts.stereo = camera.GetAttributeType() == FbxNodeAttribute::eCameraStereo;
@@ -249,9 +248,6 @@ CameraMoment CameraFacts::at(double frame) const {
     moment.roll = value(TnFbxCamera::kFbxCameraRoll);
     moment.interest = {value(TnFbxCamera::kFbxCameraLookAtPositionX), value(TnFbxCamera::kFbxCameraLookAtPositionY),
                        value(TnFbxCamera::kFbxCameraLookAtPositionZ)};
-    // A point of interest stays in the file's unit when the scene is converted; a target's place does not.
-    for (double& coordinate : moment.interest)
-        coordinate *= hasTarget ? 1.0 : mUnit;
     const FbxAMatrix place = placeAt(*mValues, frame);
     const FbxVector4 position = place.GetT();
     moment.position = {position[0], position[1], position[2]};

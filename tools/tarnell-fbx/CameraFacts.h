@@ -108,7 +108,6 @@ private:
     friend class CameraGathering;
     std::shared_ptr<const Tarnell::Fbx::TnFbxCamera> mValues;
     double mFrameRate = 24.0;
-    double mUnit = 1.0; ///< of the file, centimetres
 };
 
 struct CameraList {
