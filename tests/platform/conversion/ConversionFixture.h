@@ -10,8 +10,8 @@
 
 #include <fbxsdk/FbxNode.h>
 
-#include "PlainMatrix.h"
 #include "platform/scene/Animate.h"
+#include "platform/scene/PlainMatrix.h"
 #include "platform/scene/SceneFixture.h"
 #include "platform/scene/SeededRandom.h"
 
