@@ -6,9 +6,6 @@
 #include <memory>
 
 #include "Fbx.h"
-#include "TnFbxCamera.h"
-#include "TnFbxError.h"
-#include "TnFbxReadInfo.h"
 
 int main(int, char** argv) {
     using namespace Tarnell::Fbx;

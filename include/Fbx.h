@@ -5,22 +5,24 @@
 // again, or writes one.
 #pragma once
 
+#include "TnFbxCamera.h"
+#include "TnFbxError.h"
 #include "TnFbxExport.h"
+#include "TnFbxLight.h"
+#include "TnFbxLimits.h"
+#include "TnFbxMarker.h"
+#include "TnFbxMesh.h"
+#include "TnFbxNull.h"
+#include "TnFbxReadInfo.h"
+#include "TnFbxTransform.h"
+#include "TnFbxWriteInfo.h"
 
 #include <string>
 #include <vector>
 
 namespace Tarnell::Fbx {
 
-class FbxSdk;
-class TnFbxCamera;
-class TnFbxLight;
-class TnFbxMarker;
-class TnFbxMesh;
-class TnFbxNull;
-class TnFbxReadInfo;
-class TnFbxTransform;
-class TnFbxWriteInfo;
+class FbxSdk; // its header brings the platform's along, which few hosts need
 
 /// The facade. It has no state: any number of threads may call any number of facades.
 ///
