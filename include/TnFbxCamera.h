@@ -86,7 +86,7 @@ public:
     /// False when there is no such channel; nothing changes then. A single sample is set through `getCameraChannel`.
     bool setValue(EFbxCameraChannelType channel, float value);
     bool setValueAt(EFbxCameraChannelType channel, TnFbxTime time, const std::vector<float>& values);
-    bool setValueAt(EFbxCameraChannelType channel, TnFbxTime time, std::vector<float>&& values);
+    bool moveValuesAt(EFbxCameraChannelType channel, TnFbxTime time, std::vector<float>&& values);
 
     /// What a channel holds. Where there is no such channel: 0, 0, false and a default time record.
     float getValue(EFbxCameraChannelType channel) const;

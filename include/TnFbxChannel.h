@@ -62,7 +62,7 @@ public:
     /// are fewer values than frames. Values beyond the range are accepted and never read. Copied values
     /// take the memory that the channel has, values that are moved in bring their own.
     bool setAnimatedValues(TnFbxTime time, const std::vector<float>& values);
-    bool setAnimatedValues(TnFbxTime time, std::vector<float>&& values);
+    bool moveAnimatedValues(TnFbxTime time, std::vector<float>&& values);
 
     /// The same with one value for every frame of the range. It takes the memory of one sample; what there was before
     /// is released.

@@ -67,7 +67,7 @@ public:
     /// False when there is no such channel; nothing changes then. A single sample is set through `getLightChannel`.
     bool setValue(EFbxLightChannelType channel, float value);
     bool setValueAt(EFbxLightChannelType channel, TnFbxTime time, const std::vector<float>& values);
-    bool setValueAt(EFbxLightChannelType channel, TnFbxTime time, std::vector<float>&& values);
+    bool moveValuesAt(EFbxLightChannelType channel, TnFbxTime time, std::vector<float>&& values);
 
     /// What a channel holds. Where there is no such channel: 0, 0, false and a default time record.
     float getValue(EFbxLightChannelType channel) const;

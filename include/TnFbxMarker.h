@@ -56,7 +56,7 @@ public:
     /// False when there is no such channel; nothing changes then.
     bool setValue(EFbxMarkerChannelType channel, float value);
     bool setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, const std::vector<float>& values);
-    bool setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, std::vector<float>&& values);
+    bool moveValuesAt(EFbxMarkerChannelType channel, TnFbxTime time, std::vector<float>&& values);
 
     /// What a channel holds. Where there is no such channel: 0, 0, false and a default time record.
     float getValue(EFbxMarkerChannelType channel) const;

@@ -85,7 +85,7 @@ public:
     /// `getTransformChannel`.
     bool setTransformValue(EFbxTransformChannelType channel, float value);
     bool setTransformValueAt(EFbxTransformChannelType channel, TnFbxTime time, const std::vector<float>& values);
-    bool setTransformValueAt(EFbxTransformChannelType channel, TnFbxTime time, std::vector<float>&& values);
+    bool moveTransformValuesAt(EFbxTransformChannelType channel, TnFbxTime time, std::vector<float>&& values);
 
     /// What a channel holds. Where there is no such channel: 0, 0, false and a default time record.
     float getTransformValue(EFbxTransformChannelType channel) const;

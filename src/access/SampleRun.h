@@ -67,7 +67,7 @@ public:
             return false;
         }
         return mValues.empty() ? channel.setConstantValues(time, mFirst)
-                               : channel.setAnimatedValues(time, std::move(mValues));
+                               : channel.moveAnimatedValues(time, std::move(mValues));
     }
 
     /// One float per frame, whether they are the same or not.

@@ -83,7 +83,7 @@ bool fillChannels(Scene& scene, bool animated, Object& object, Channel firstChan
     }
     for (std::size_t i = 0; i < kCount; ++i) {
         if (!samples[i].isOneValue()) { // samples that are all alike are no animation
-            object.setValueAt(channelAt(i), timeline.record(scene.frame()), samples[i].takeAll());
+            object.moveValuesAt(channelAt(i), timeline.record(scene.frame()), samples[i].takeAll());
         }
     }
     return true;

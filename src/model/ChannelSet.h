@@ -85,11 +85,14 @@ struct ChannelSet {
         return found != nullptr && found->setValue(value);
     }
 
-    /// The values are copied or moved, as they are given.
-    template <class Values>
-    static bool setValues(Array& channels, Channel channel, const TnFbxTime& time, Values&& values) {
+    static bool setValues(Array& channels, Channel channel, const TnFbxTime& time, const std::vector<float>& values) {
         TnFbxChannel* found = find(channels, channel);
-        return found != nullptr && found->setAnimatedValues(time, std::forward<Values>(values));
+        return found != nullptr && found->setAnimatedValues(time, values);
+    }
+
+    static bool moveValues(Array& channels, Channel channel, const TnFbxTime& time, std::vector<float>&& values) {
+        TnFbxChannel* found = find(channels, channel);
+        return found != nullptr && found->moveAnimatedValues(time, std::move(values));
     }
 
     static float value(const Array& channels, Channel channel) {

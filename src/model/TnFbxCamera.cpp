@@ -85,8 +85,8 @@ bool TnFbxCamera::setValueAt(EFbxCameraChannelType channel, TnFbxTime time, cons
     return Channels::setValues(mChannels, channel, time, values);
 }
 
-bool TnFbxCamera::setValueAt(EFbxCameraChannelType channel, TnFbxTime time, std::vector<float>&& values) {
-    return Channels::setValues(mChannels, channel, time, std::move(values));
+bool TnFbxCamera::moveValuesAt(EFbxCameraChannelType channel, TnFbxTime time, std::vector<float>&& values) {
+    return Channels::moveValues(mChannels, channel, time, std::move(values));
 }
 
 float TnFbxCamera::getValue(EFbxCameraChannelType channel) const { return Channels::value(mChannels, channel); }

@@ -173,7 +173,7 @@ bool TnFbxChannel::setAnimatedValues(TnFbxTime time, const std::vector<float>& v
     return true;
 }
 
-bool TnFbxChannel::setAnimatedValues(TnFbxTime time, std::vector<float>&& values) {
+bool TnFbxChannel::moveAnimatedValues(TnFbxTime time, std::vector<float>&& values) {
     if (!areSamples(time, values.size())) {
         return false;
     }

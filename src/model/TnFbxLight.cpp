@@ -58,8 +58,8 @@ bool TnFbxLight::setValueAt(EFbxLightChannelType channel, TnFbxTime time, const 
     return Channels::setValues(mChannels, channel, time, values);
 }
 
-bool TnFbxLight::setValueAt(EFbxLightChannelType channel, TnFbxTime time, std::vector<float>&& values) {
-    return Channels::setValues(mChannels, channel, time, std::move(values));
+bool TnFbxLight::moveValuesAt(EFbxLightChannelType channel, TnFbxTime time, std::vector<float>&& values) {
+    return Channels::moveValues(mChannels, channel, time, std::move(values));
 }
 
 float TnFbxLight::getValue(EFbxLightChannelType channel) const { return Channels::value(mChannels, channel); }

@@ -56,8 +56,8 @@ bool TnFbxMarker::setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, cons
     return Channels::setValues(mChannels, channel, time, values);
 }
 
-bool TnFbxMarker::setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, std::vector<float>&& values) {
-    return Channels::setValues(mChannels, channel, time, std::move(values));
+bool TnFbxMarker::moveValuesAt(EFbxMarkerChannelType channel, TnFbxTime time, std::vector<float>&& values) {
+    return Channels::moveValues(mChannels, channel, time, std::move(values));
 }
 
 float TnFbxMarker::getValue(EFbxMarkerChannelType channel) const { return Channels::value(mChannels, channel); }

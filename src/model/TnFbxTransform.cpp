@@ -68,9 +68,9 @@ bool TnFbxTransform::setTransformValueAt(EFbxTransformChannelType channel, TnFbx
     return Channels::setValues(mChannels, channel, time, values);
 }
 
-bool TnFbxTransform::setTransformValueAt(EFbxTransformChannelType channel, TnFbxTime time,
-                                         std::vector<float>&& values) {
-    return Channels::setValues(mChannels, channel, time, std::move(values));
+bool TnFbxTransform::moveTransformValuesAt(EFbxTransformChannelType channel, TnFbxTime time,
+                                           std::vector<float>&& values) {
+    return Channels::moveValues(mChannels, channel, time, std::move(values));
 }
 
 float TnFbxTransform::getTransformValue(EFbxTransformChannelType channel) const {

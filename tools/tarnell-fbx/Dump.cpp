@@ -128,7 +128,7 @@ private:
             std::vector<float> samples;
             for (long long frame = time.getStartFrame(); frame <= time.getEndFrame(); ++frame)
                 samples.push_back(marker.getValueAt(channel, static_cast<float>(frame)));
-            copy.setAnimatedValues(time, std::move(samples));
+            copy.moveAnimatedValues(time, std::move(samples));
         }
         return copy;
     }
