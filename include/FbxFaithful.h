@@ -5,6 +5,7 @@
 // Hosts that do not can call `Fbx`, which loads the file for every call.
 #pragma once
 
+#include "FbxPlatform.h"
 #include "TnFbxCamera.h"
 #include "TnFbxExport.h"
 #include "TnFbxLight.h"
@@ -13,8 +14,6 @@
 #include "TnFbxNull.h"
 #include "TnFbxReadInfo.h"
 #include "TnFbxTransform.h"
-
-#include <fbxsdk.h>
 
 #include <memory>
 

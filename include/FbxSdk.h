@@ -6,6 +6,7 @@
 // Hosts reach it through `Fbx`, which makes one for every call.
 #pragma once
 
+#include "FbxPlatform.h"
 #include "TnFbxCamera.h"
 #include "TnFbxExport.h"
 #include "TnFbxLight.h"
@@ -16,8 +17,6 @@
 #include "TnFbxTime.h"
 #include "TnFbxTransform.h"
 #include "TnFbxWriteInfo.h"
-
-#include <fbxsdk.h>
 
 #include <cstdint>
 #include <memory>

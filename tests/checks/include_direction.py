@@ -21,9 +21,11 @@ PLATFORM = re.compile(
     r'^[<"](?:.*/)?(?:fbxsdk\.h|fbxsdk/.*|(?:core|container|schema|document|object|animation|scene|cache|geometry|conversion|io)/.*)[>"]$'
 )
 # What belongs to the library: its public headers and its own folders.
-LIBRARY = re.compile(r'^[<"](?:.*/)?(?:Tn\w+\.h|Fbx\.h|FbxSdk\.h|FbxFaithful\.h|(?:model|access|sdk|faithful)/.*)[>"]$')
+LIBRARY = re.compile(r'^[<"](?:.*/)?(?:Tn\w+\.h|Fbx\.h|FbxSdk\.h|FbxFaithful\.h|FbxPlatform\.h|(?:model|access|sdk|faithful)/.*)[>"]$')
 # The layers above the value classes.
-ABOVE_MODEL = re.compile(r'^[<"](?:.*/)?(?:Fbx\.h|FbxSdk\.h|FbxFaithful\.h|TnFbxError\.h|(?:access|sdk|faithful)/.*)[>"]$')
+ABOVE_MODEL = re.compile(
+    r'^[<"](?:.*/)?(?:Fbx\.h|FbxSdk\.h|FbxFaithful\.h|FbxPlatform\.h|TnFbxError\.h|(?:access|sdk|faithful)/.*)[>"]$'
+)
 # The two adapters.
 COMPATIBLE = re.compile(r'^[<"](?:.*/)?(?:FbxSdk\.h|sdk/.*)[>"]$')
 FAITHFUL = re.compile(r'^[<"](?:.*/)?(?:FbxFaithful\.h|faithful/.*)[>"]$')
@@ -42,8 +44,10 @@ RULES = (
     Rule(MODEL, PLATFORM, frozenset(), "the value classes know no platform"),
     Rule(("include/TnFbx[!E]*.h", "src/model/*.h", "src/model/*.cpp"), ABOVE_MODEL, frozenset(),
          "the value classes know neither adapter nor facade"),
-    Rule(("include/*.h", "src/*/*.h", "src/*/*.cpp", "src/*.h", "src/*.cpp"), PLATFORM, frozenset({"<fbxsdk.h>"}),
-         "the library sees the platform only as <fbxsdk.h>"),
+    Rule(("include/*.h", "src/*/*.h", "src/*/*.cpp", "src/*.h", "src/*.cpp"), PLATFORM,
+         frozenset({"<fbxsdk.h>", "<fbxsdk/Platform.h>"}), "the library sees the platform only as <fbxsdk.h>"),
+    Rule(("include/Fbx[!P]*.h",), re.compile("<fbxsdk.h>"), frozenset(),
+         "where file names ignore case that is FbxSdk.h: public headers include FbxPlatform.h"),
     Rule(("src/access/*.h", "src/access/*.cpp"), EITHER, frozenset(), "what both adapters need knows neither"),
     Rule(("src/faithful/*.h", "src/faithful/*.cpp"), COMPATIBLE, frozenset(), "the adapters do not know each other"),
     Rule(("src/sdk/*.h", "src/sdk/*.cpp"), FAITHFUL, frozenset(), "the adapters do not know each other"),
@@ -78,7 +82,7 @@ OTHER_HEADERS = {
     "FbxArch": "core", "FbxArray": "core", "FbxColor": "core", "FbxEuler": "core", "FbxTypes": "core",
     "FbxVector2": "core", "FbxVector4": "core", "FbxTransform": "core", "FbxSystemUnit": "scene",
     "FbxAxisSystem": "scene", "FbxNurbs": "geometry", "FbxBlendShapeChannel": "geometry", "FbxSceneRenamer": "io",
-    "FbxTakeInfo": "io",
+    "FbxTakeInfo": "io", "Platform": "io",
 }
 
 

@@ -82,6 +82,11 @@ class IncludeDirection(unittest.TestCase):
         self.assertEqual(len(found), 1)
         self.assertTrue(found[0].startswith("src/model/TnFbxMesh.cpp:3: <fbxsdk.h>"), found)
 
+    def test_refuses_the_plain_name_of_the_platform_in_public_headers(self):
+        self.assertEqual(len(self.check("include/FbxSdk.h", "#include <fbxsdk.h>\n")), 1)
+        self.assertEqual(len(self.check("include/TnFbxMesh.h", '#include "FbxPlatform.h"\n')), 1)
+        self.assertEqual(self.check("include/FbxSdk.h", '#include "FbxPlatform.h"\n'), [])
+
     def test_lets_pass_what_points_down(self):
         for file, source in (
             ("include/TnFbxMesh.h", '#include "TnFbxTransform.h"\n#include <vector>\n'),
