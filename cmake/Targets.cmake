@@ -34,6 +34,13 @@ function(tarnell_count_steps name)
   endif()
 endfunction()
 
+# A shared library exports what cmake/NAME.map lets through.
+function(tarnell_export name)
+  set(map "${PROJECT_SOURCE_DIR}/cmake/${name}.map")
+  target_link_options(${name} PRIVATE "LINKER:--version-script=${map}")
+  set_target_properties(${name} PROPERTIES LINK_DEPENDS "${map}")
+endfunction()
+
 # tarnell_room(NAME [NEEDS room...] [LIBRARIES library...]): every source below src/NAME. A room may use those it needs,
 # and those that these need. `fbxsdk_up_to_NAME` is all of them, with the internals visible: what the room's tests link.
 function(tarnell_room name)

@@ -375,22 +375,22 @@ public:
                    bool asciiFormat, TnFbxWriteInfo::eCompatibilityVersion version, bool embedMedia);
 
 private:
-    fbxsdk::FbxAnimLayer* currentLayer() const;
-    void addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const TnFbxWriteInfo& info, const TnFbxTime& time,
-                       detail::ObjectWarnings& warnings);
+    TARNELL_FBX_LOCAL fbxsdk::FbxAnimLayer* currentLayer() const;
+    TARNELL_FBX_LOCAL void addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const TnFbxWriteInfo& info,
+                                         const TnFbxTime& time, detail::ObjectWarnings& warnings);
     template <class Object>
-    bool readList(TnFbxReadInfo& info, Object* objects, int count);
+    TARNELL_FBX_LOCAL bool readList(TnFbxReadInfo& info, Object* objects, int count);
     template <class Walk>
-    bool walkSubtree(const Walk& walk, fbxsdk::FbxNode* top);
-    bool readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count, int& index);
-    bool getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node, TnFbxCamera& camera,
-                         fbxsdk::FbxAMatrix& geometric, detail::PropertySampler& sampler);
-    void setLookAtRotation(TnFbxCamera& camera);
-    void storeGlobalTransform(const TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxAMatrix& geometric,
-                              TnFbxTransform& transform);
-    void setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& source,
-                          const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh);
-    detail::PropertySampler sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS);
+    TARNELL_FBX_LOCAL bool walkSubtree(const Walk& walk, fbxsdk::FbxNode* top);
+    TARNELL_FBX_LOCAL bool readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count, int& index);
+    TARNELL_FBX_LOCAL bool getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node, TnFbxCamera& camera,
+                                           fbxsdk::FbxAMatrix& geometric, detail::PropertySampler& sampler);
+    TARNELL_FBX_LOCAL void setLookAtRotation(TnFbxCamera& camera);
+    TARNELL_FBX_LOCAL void storeGlobalTransform(const TnFbxTime& time, fbxsdk::FbxNode& node,
+                                                fbxsdk::FbxAMatrix& geometric, TnFbxTransform& transform);
+    TARNELL_FBX_LOCAL void setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& source,
+                                            const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh);
+    TARNELL_FBX_LOCAL detail::PropertySampler sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS);
 
     bool mInitialized = false;
     bool mCachesAppearWithScene = false;

@@ -82,11 +82,11 @@ public:
 
 private:
     float sampleAt(std::size_t index) const { return mValues[mValues.size() > 1 ? index : 0]; }
-    std::size_t indexOf(int frame) const;
-    std::size_t countToCover(int frame) const;
-    void takeOver(const TnFbxTime& time, std::size_t count);
-    void spread();
-    void coverFrame(int frame);
+    TARNELL_FBX_LOCAL std::size_t indexOf(int frame) const;
+    TARNELL_FBX_LOCAL std::size_t countToCover(int frame) const;
+    TARNELL_FBX_LOCAL void takeOver(const TnFbxTime& time, std::size_t count);
+    TARNELL_FBX_LOCAL void spread();
+    TARNELL_FBX_LOCAL void coverFrame(int frame);
 
     bool mAnimated;
     TnFbxTime mTime;

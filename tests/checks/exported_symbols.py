@@ -1,22 +1,136 @@
+#!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-#
-# What the shared libraries export: only names of their own. Platform symbols carry the inline namespace, so that they
-# never meet those of another SDK in one process.
-#   exported_symbols.py LIBRARY PREFIX...   every exported symbol must contain one of the prefixes
+"""Holds what a shared library exports against its public headers.
+
+Usage: exported_symbols.py LIBRARY_FILE PRODUCT
+
+PRODUCT is `library` or `platform`. Every exported symbol must be public in the product's headers or stand among the
+exceptions below, and every public function that the headers only declare must be exported. Doxygen reads the headers.
+"""
+
+import re
 import subprocess
 import sys
+import tempfile
+import xml.etree.ElementTree as ElementTree
+from collections import Counter
+from pathlib import Path
+from typing import NamedTuple
 
-library, prefixes = sys.argv[1], sys.argv[2:]
-listing = subprocess.run(["nm", "-D", "--defined-only", "-C", library], capture_output=True, text=True, check=True)
-symbols = [line.split(None, 2)[2] for line in listing.stdout.splitlines() if len(line.split(None, 2)) == 3]
-# Weak instances of standard templates are shared by every C++ library.
-standard = ("std::", "__gnu_cxx::", "typeinfo", "vtable", "operator new", "operator delete", "void std::", "bool std::",
-            "decltype", "__asan", "__ubsan", "__tsan", "_init", "_fini")
-foreign = [name for name in symbols if not any(p in name for p in prefixes) and not name.startswith(standard)]
-if not symbols:
-    print(f"{library}: exports nothing")
-    sys.exit(1)
-for name in foreign[:20]:
-    print(f"{library}: exports {name}")
-sys.exit(1 if foreign else 0)
+ROOT = Path(__file__).resolve().parent.parent.parent
+# The reference shows no private members, and the platform's inline namespace neither.
+SETTINGS = "GENERATE_HTML = NO\nEXTRACT_PRIVATE = YES\nEXCLUDE_SYMBOLS =\n"
+INLINE_NAMESPACE = "fbxsdk::tarnell::"
+OF_A_CLASS = re.compile(r"^(?:typeinfo(?: name)?|vtable|VTT|guard variable) for ")
+
+# Not public, and exported all the same: name (a pattern), and why.
+EXCEPTIONS = {
+    "library": (),
+    "platform": (
+        (r"fbxsdk::FbxProperty::(readValue|writeValue|evaluate)", "called by Get, Set and EvaluateValue, templates"),
+        (r"fbxsdk::detail::(PlainStorage|StoredItems)(::.*)?", "called by FbxPlainArray, a template"),
+        (r"fbxsdk::detail::throwMissing(Direct|Index)Array", "called by FbxLayerElementTemplate, a template"),
+        (r"fbxsdk::FbxLayerElementTemplate::.*", "instances of a template"),
+        (r"fbxsdk::(\w+)::~?\1", "protected constructors and destructors"),
+        (r"fbxsdk::\w+::(connectionChanged|sceneChanged|readSource)", "protected, called by the platform itself"),
+        (r"fbxsdk::FbxLayerContainer::(detachSource|removeElementEntries)|fbxsdk::FbxLayerElement::joinOwner",
+         "protected, called by the platform itself"),
+        (r"fbxsdk::Fbx(LayerContainer::(adopt|disown|loadSource)|Layer::(set|forget)|Mesh::dropEdges|Cluster::loadSource)",
+         "private, and not marked yet"),
+        (r"fbxsdk::FbxNode::(child(Connected|Disconnected)|pivots|pivotVector|setPivotVector|destinationPivots)",
+         "private, and not marked yet"),
+        (r"fbxsdk::Fbx(BlendShapeChannel::completeFullWeights|Camera::apertureMillimetres"
+         r"|NurbsSurfaceBase::(knots|multiplicity))", "private, and not marked yet"),
+    ),
+}
+
+
+class Function(NamedTuple):
+    is_public: bool
+    is_declared_only: bool  # its definition is in the library
+
+
+def functions_and_classes(xml_folder):
+    """What the headers declare: functions and variables by name, and the names of public classes."""
+    functions, classes = {}, set()
+    for path in sorted(Path(xml_folder).glob("*.xml")):
+        for compound in ElementTree.parse(path).getroot().findall("compounddef"):
+            name = compound.findtext("compoundname")
+            in_scope = compound.get("kind") in ("class", "struct", "namespace")
+            is_internal = "detail" in name.split("::")
+            if not in_scope or name.startswith("std"):
+                continue
+            if compound.get("prot") != "private" and not is_internal:
+                classes.add(re.sub("<.*>", "", name).strip())
+            for member in compound.iter("memberdef"):
+                if member.get("kind") in ("function", "variable"):
+                    functions.setdefault(f"{name}::{member.findtext('name')}", []).append(
+                        Function(member.get("prot") == "public" and not is_internal,
+                                 is_declared_only(member, compound)))
+    return functions, classes
+
+
+def is_declared_only(member, compound):
+    arguments = member.findtext("argsstring") or ""
+    has_body = member.get("inline") == "yes" or member.find("location").get("bodyfile") is not None
+    is_template = member.find("templateparamlist") is not None or compound.find("templateparamlist") is not None
+    return (member.get("kind") == "function" and not has_body and not is_template
+            and not arguments.endswith(("=0", "=default", "=delete")))
+
+
+def name_of(symbol):
+    """The qualified name within a demangled symbol: without result, arguments and template arguments."""
+    symbol = symbol.replace(INLINE_NAMESPACE, "fbxsdk::").replace("[abi:cxx11]", "")
+    symbol = OF_A_CLASS.sub("", symbol)
+    operator = re.search(r"operator(\(\)|<=|>=|<<|>>|->|<|>)", symbol)
+    marked = symbol.replace(operator[0], "operator@", 1) if operator else symbol
+    plain, depth = "", 0
+    for character in marked:
+        depth += (character in "<(") - (character in ">)")
+        if depth == 0 and character not in ">)":
+            plain += character
+    plain = plain.removesuffix(" const").strip()
+    if " operator" not in plain and "::operator " not in plain:
+        plain = plain.split(" ")[-1]
+    return plain.replace("operator@", operator[0]) if operator else plain
+
+
+def violations(symbols, functions, classes, exceptions):
+    exported = Counter()
+    for symbol in sorted(set(symbols)):
+        name = name_of(symbol)
+        exported[name] += 1
+        public = sum(function.is_public for function in functions.get(name, ()))
+        is_public = name in classes if OF_A_CLASS.match(symbol) else exported[name] <= public
+        # Each instance of a template is a symbol of its own.
+        if not is_public and not ("<" in symbol.split("(")[0] and public):
+            if not any(re.fullmatch(pattern, name) for pattern, _ in exceptions):
+                yield f"exported, but not public: {symbol}"
+    for name, overloads in sorted(functions.items()):
+        if any(function.is_public and function.is_declared_only for function in overloads) and not exported[name]:
+            yield f"public, but not exported: {name}"
+
+
+def exported_symbols(library):
+    listing = subprocess.run(["nm", "-D", "--defined-only", "-C", library], capture_output=True, text=True, check=True)
+    return [line.split(None, 2)[2] for line in listing.stdout.splitlines() if len(line.split(None, 2)) == 3]
+
+
+def main():
+    library, product = sys.argv[1], sys.argv[2]
+    settings = (ROOT / f"docs/api/{product}.doxyfile").read_text(encoding="utf-8") + SETTINGS
+    with tempfile.TemporaryDirectory() as folder:
+        subprocess.run(["doxygen", "-"], input=f"{settings}OUTPUT_DIRECTORY = {folder}\n", text=True, check=True,
+                       capture_output=True, cwd=ROOT)
+        functions, classes = functions_and_classes(Path(folder) / "xml")
+    symbols = exported_symbols(library)
+    if not symbols or not functions:
+        sys.exit(f"{library}: nothing is exported or declared")
+    found = list(violations(symbols, functions, classes, EXCEPTIONS[product]))
+    print("\n".join(found))
+    return 1 if found else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())
