@@ -20,6 +20,7 @@
 #include <string>
 #include <vector>
 
+/// The library: value classes, the facade and the adapters.
 namespace Tarnell::Fbx {
 
 class FbxSdk; // its header brings the platform's along, which few hosts need
@@ -31,9 +32,11 @@ class FbxSdk; // its header brings the platform's along, which few hosts need
 /// failure, too, unless what was read until then is all that was asked for.
 class TARNELL_FBX_API Fbx {
 public:
+    /// Costs nothing and opens nothing.
     Fbx();
     ~Fbx();
     Fbx(const Fbx& other) = default;
+    /// Copies nothing: there is no state.
     Fbx& operator=(const Fbx& other);
 
     /// Loads a file into a context of the caller's, with NURBS and patches turned into meshes. After a failure the
@@ -54,23 +57,30 @@ public:
     /// when nothing in it is animated.
     bool getAnimationFrameRange(const char* fileName, float& start, float& end) const;
 
-    // The readers: every object of a kind in the file, or the one named by `info.getObjectName()`.
-    //
-    // `*objects` receives an array of `count` objects, parents before their children; null when `count` is 0, which is
-    // a success. The caller owns it and releases it with `delete[]`, also after a failure and after std::bad_alloc.
-    // With `kFbxFidelityFaithful` in `info` the values are those of docs/faithful.md, and what is said below of
-    // producer cameras, surfaces and the first stack does not hold. False when `objects` is null (`count` is untouched
-    // then), when `info` names no animation stack or no file, and when the file cannot be read. The first stack of the
-    // file is read, whatever the name.
-
+    /// Reads every object of the kind in the file, or the one named by `info.getObjectName()`.
+    ///
+    /// `*objects` receives an array of `count` objects, parents before their children; null when `count` is 0, which is
+    /// a success. The caller owns it and releases it with `delete[]`, also after a failure and after std::bad_alloc.
+    /// False when `objects` is null (`count` is untouched then), when `info` names no file or no animation stack, and
+    /// when the file cannot be read. The first stack of the file is read, whatever the name; docs/kept-behaviours.md
+    /// lists what else is kept. With `kFbxFidelityFaithful` in `info` the stack of the name is read, an empty name
+    /// means the first one, and the values are those of docs/faithful.md.
+    /// @{
     bool getMeshes(TnFbxReadInfo& info, TnFbxMesh** objects, int& count) const;
-    /// The seven producer cameras come first; a file that has none gets them.
-    bool getCameras(TnFbxReadInfo& info, TnFbxCamera** objects, int& count) const;
     bool getLights(TnFbxReadInfo& info, TnFbxLight** objects, int& count) const;
     bool getMarkers(TnFbxReadInfo& info, TnFbxMarker** objects, int& count) const;
-    /// NURBS surfaces are counted but not read: as many objects at the end of the array stay as they were made.
+    /// @}
+
+    /// As `getMeshes`. Unless the read is faithful, the seven producer cameras come first, and a file that has none
+    /// gets them.
+    bool getCameras(TnFbxReadInfo& info, TnFbxCamera** objects, int& count) const;
+
+    /// As `getMeshes`. Unless the read is faithful, NURBS surfaces are counted but not read: as many objects at the end
+    /// of the array stay in the state of new ones.
     bool getNulls(TnFbxReadInfo& info, TnFbxNull** objects, int& count) const;
-    /// Nulls, markers and meshes; NURBS surfaces as with `getNulls`.
+
+    /// As `getMeshes`: nulls, markers and meshes, and NURBS surfaces as with `getNulls`; every node below the root when
+    /// the read is faithful.
     bool getTransforms(TnFbxReadInfo& info, TnFbxTransform** objects, int& count) const;
 
     /// Writes one file, and beside it the point caches of animated meshes. The objects are only read; null pointers are

@@ -26,26 +26,29 @@ namespace Tarnell::Fbx {
 /// `lastError()` says why; each operation is a call of its own as far as `lastWarnings()` goes.
 class TARNELL_FBX_API FbxFaithful {
 public:
+    /// No file yet.
     FbxFaithful();
     ~FbxFaithful();
     FbxFaithful(const FbxFaithful&) = delete;
     FbxFaithful& operator=(const FbxFaithful&) = delete;
 
-    /// Once. Selects the stack and the frames; what the options say of spaces and points holds for all reads.
+    /// Loads the file that the options name, and selects the stack and the frames; what they say of spaces and points
+    /// holds for all reads. To be called once.
     bool load(const TnFbxReadInfo& info);
 
-    /// Null before a file is loaded. Scene objects stay the scene's; nobody but this may change them.
+    /// The scene of the file, null before one is loaded. It and its objects belong to this object, and the host must
+    /// not change them.
     fbxsdk::FbxScene* getScene() const;
 
-    /// Frames per second of samples, and the first and last one.
-    double getFrameRate() const;
-    long long getFirstFrame() const;
-    long long getLastFrame() const;
+    double getFrameRate() const;     ///< Frames per second of samples.
+    long long getFirstFrame() const; ///< The first frame of samples.
+    long long getLastFrame() const;  ///< The last frame of samples, inclusive.
 
-    /// From now on static values, and meshes, are those at that frame. False for a frame that is no number.
+    /// Sets the frame of the static values and meshes that are read from now on. False for a frame that is NaN or
+    /// infinite.
     bool setFrame(float frame);
 
-    /// Puts meshes in the place of NURBS and patches. A read of all meshes does so by itself.
+    /// Replaces NURBS and patches by meshes. A read of all meshes does so by itself.
     bool makeMeshes();
 
     /// All objects of a kind, or the first of the name in the options, in an array that the caller owns; null for none.
@@ -65,6 +68,7 @@ private:
     std::unique_ptr<File> mFile;
 };
 
+/// The instances of the templates for one class, which are in the library.
 #define TARNELL_FBX_FAITHFUL(Object)                                                                                   \
     extern template TARNELL_FBX_API bool FbxFaithful::readAll(Object**, int&);                                         \
     extern template TARNELL_FBX_API bool FbxFaithful::read(fbxsdk::FbxNode&, Object&);

@@ -91,9 +91,11 @@ public:
     /// The context's scene, null when not initialised.
     fbxsdk::FbxScene* getScene() const;
 
-    /// Turns every NURBS and patch (below a node) into a mesh; always true.
+    /// Turns every NURBS and patch of the scene, or of the node and what is below it, into a mesh; always true.
+    /// @{
     bool convertNurbsAndPatch(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene);
     bool convertNurbsAndPatchRecursive(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* node);
+    /// @}
 
     // ---- Animation stacks and time ----
 
@@ -120,10 +122,10 @@ public:
 
     /// How many nodes below the root the mask selects; 0 without a context or scene.
     int getNumberOfNodeTypes(int mask) const;
-    int getNumberOfMeshes() const;
-    int getNumberOfCameras() const; ///< The producer cameras included.
-    int getNumberOfLights() const;
-    int getNumberOfMarkers() const;
+    int getNumberOfMeshes() const;     ///< Nodes with a mesh, those made of NURBS and patches included.
+    int getNumberOfCameras() const;    ///< The producer cameras included.
+    int getNumberOfLights() const;     ///< Nodes with a light.
+    int getNumberOfMarkers() const;    ///< Nodes with a marker.
     int getNumberOfNulls() const;      ///< NURBS surfaces included, which `getNulls` does not read.
     int getNumberOfTransforms() const; ///< NURBS surfaces included, which `getTransforms` does not read.
 
@@ -147,25 +149,28 @@ public:
     bool getAnimationFrameRangeRecursive(fbxsdk::FbxNode* node, float& start, float& end);
 
     // ---- Reading all objects of a kind ----
-    //
-    // Each fills an array of `count` objects, parents before their children, or only its first element when `info` asks
-    // for a single name. False for a null array, a count below 1, without a context or scene, and when there are more
-    // objects than elements; what was filled until then stays. Elements without an object stay as they are.
-    //
-    // Animated channels get one sample for every whole frame; where all are equal they take the memory of one. False
-    // also when the samples of a list would take more than `memoryLimit()`: `lastError()` says over which frames they
-    // were asked for and how much they would have needed. Channels that got none are not animated then.
 
+    /// Fills an array of `count` objects, parents before their children, or only its first element when `info` asks for
+    /// a single name. Producer cameras come first.
+    ///
+    /// False for a null array, a count below 1, without a context or scene, and when there are more objects than
+    /// elements; what was filled until then stays. Elements without an object stay as they are.
+    ///
+    /// Animated channels get one sample for every whole frame; where all are equal they take the memory of one. False
+    /// also when the samples of a list would take more than `memoryLimit()`: `lastError()` says over which frames they
+    /// were asked for and how much they would have needed. Channels that got none are not animated then.
+    /// @{
     bool getMeshes(TnFbxReadInfo& info, TnFbxMesh* meshes, int count);
-    bool getCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count); ///< The producer cameras first.
+    bool getCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count);
     bool getLights(TnFbxReadInfo& info, TnFbxLight* lights, int count);
     bool getMarkers(TnFbxReadInfo& info, TnFbxMarker* markers, int count);
     bool getNulls(TnFbxReadInfo& info, TnFbxNull* nulls, int count);
     bool getTransforms(TnFbxReadInfo& info, TnFbxTransform* transforms, int count);
+    /// @}
 
-    // The same for one node and what is below it. `index` is the next free element of the array and `count` its length;
-    // `found` says that the single object was read and ends the walk.
-
+    /// Reads a node and what is below it, as the function without "Recursive" reads the scene. `index` is the next free
+    /// element of the array and `count` its length; `found` says that the single object was read and ends the walk.
+    /// @{
     bool getMeshesRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS, bool allObjects,
                             bool transformPoints, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                             TnFbxMesh* meshes, int count, bool& found);
@@ -184,6 +189,7 @@ public:
     bool getTransformsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                 bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                                 TnFbxTransform* transforms, int count, bool& found);
+    /// @}
 
     /// One producer camera into the array: the element at `index`, which moves on, or, for a read by name, the first
     /// element if the names are equal. `index` is not compared with the array's length. False when the camera, its node
@@ -192,33 +198,37 @@ public:
                            int& index);
 
     // ---- Reading one node ----
-    //
-    // `time` is the range to sample, `global` asks for transforms in the world, and with `useSampleFPS` the key frames
-    // are converted to `sampleFPS`. `geometric` is the node's geometric transform. False for a null node, for one
-    // without the attribute that the object is read from, and when its samples would take more than `memoryLimit()`;
-    // the object keeps what was set before. Channels that the scene says nothing about keep what they held.
 
+    /// Reads one node into an object.
+    ///
+    /// `time` is the range to sample, `global` asks for transforms in the world, and with `useSampleFPS` the key frames
+    /// are converted to `sampleFPS`. `geometric` is the node's geometric transform. False for a null node, for one
+    /// without the attribute that the object is read from, and when its samples would take more than `memoryLimit()`;
+    /// the object keeps what was set before. Channels that the scene says nothing about keep what they held.
+    /// @{
     bool getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                       TnFbxTransform& transform, fbxsdk::FbxAMatrix& geometric);
     bool getLight(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                   TnFbxLight& light, fbxsdk::FbxAMatrix& geometric);
     bool getMarker(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                    TnFbxMarker& marker, fbxsdk::FbxAMatrix& geometric);
-    /// A node without an attribute is a null of the default size.
+    /// @}
+    /// As `getTransform`. A node without an attribute is a null of the default size.
     bool getNull(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                  TnFbxNull& null, fbxsdk::FbxAMatrix& geometric);
 
-    /// The camera's own placement is always local; `global` concerns its target. With `useInterestPosition` a camera
-    /// without a target looks at its interest position. A camera that looks at something gets its rotation from that.
+    /// As `getTransform`. The camera's own placement is always local; `global` concerns its target. With
+    /// `useInterestPosition` a camera without a target looks at its interest position. A camera that looks at something
+    /// gets its rotation from that.
     bool getCamera(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, bool useInterestPosition,
                    fbxsdk::FbxNode* node, TnFbxCamera& camera, fbxsdk::FbxAMatrix& geometric);
 
     /// A producer camera, static values only, called `name`; `node` may be null. False for a null camera.
     bool getProducerCamera(fbxsdk::FbxNode* node, fbxsdk::FbxCamera* camera, TnFbxCamera& out, const char* name);
 
-    /// The mesh at `time.getFrame()`, deformed. With `transformPoints` points and normals are multiplied by the node's
-    /// transform, and, unless `global`, by `geometric`. False also for a mesh without polygons or points.
-    /// Throws std::runtime_error when a layer element has no direct array; the mesh is partly filled then.
+    /// As `getTransform`: the mesh at `time.getFrame()`, deformed. With `transformPoints` points and normals are
+    /// multiplied by the node's transform, and, unless `global`, by `geometric`. False also for a mesh without polygons
+    /// or points. Throws std::runtime_error when a layer element has no direct array; the mesh is partly filled then.
     bool getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                  bool transformPoints, TnFbxMesh& mesh, fbxsdk::FbxAMatrix& geometric);
 
@@ -245,13 +255,16 @@ public:
     bool setTransformValues(fbxsdk::FbxNode* node, TnFbxTime& time, bool useSampleFPS, float sampleFPS,
                             TnFbxTransform* transform);
 
-    /// The rotation orders of FBX and of the library; what is out of range gives ZXY.
+    /// Converts between the rotation orders of FBX and of the library; what is out of range gives ZXY.
+    /// @{
     TnFbxTransform::EFbxTransformRotationOrder getRotationOrderConstant(fbxsdk::FbxEuler::EOrder order);
     fbxsdk::FbxEuler::EOrder getRotationOrderConstant(TnFbxTransform::EFbxTransformRotationOrder order);
+    /// @}
 
-    /// The node's geometric offset; always true.
+    /// The node's geometric offset: scene units, degrees and factors. Always true.
     bool getGeometricTransformation(fbxsdk::FbxNode* node, fbxsdk::FbxVector4& translation,
                                     fbxsdk::FbxVector4& rotation, fbxsdk::FbxVector4& scaling);
+    /// The same as a matrix.
     fbxsdk::FbxAMatrix getGeometry(fbxsdk::FbxNode* node);
 
     /// The default values of the curves of the node's local transform on the layers of the current stack; components
@@ -270,11 +283,14 @@ public:
     void getDeformedControlPoints(fbxsdk::FbxNode* node, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
                                   fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxVector4** points);
 
-    // The three kinds of deformation, each on an array with one element per control point. A cache that cannot be read
-    // leaves the points alone; its file must be open.
+    /// Overwrites the points, one per control point, by those of the mesh's vertex cache, whose file must be open. A
+    /// cache that cannot be read leaves them as they are.
     void readVertexCacheData(fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time, fbxsdk::FbxVector4* points);
+    /// Adds the blend shapes of the mesh to the points, one per control point.
     void computeShapeDeformation(fbxsdk::FbxNode* node, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
                                  fbxsdk::FbxVector4* points);
+    /// Deforms the points, one per control point, by the skins of the mesh. `globalPosition` is the mesh's place in the
+    /// world.
     void computeClusterDeformation(fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
                                    fbxsdk::FbxVector4* points);
 
@@ -282,10 +298,9 @@ public:
     /// null scene.
     bool openClosePointCacheData(fbxsdk::FbxScene* scene, bool open);
 
-    // On the sixteen elements of a matrix.
-    void matrixScale(fbxsdk::FbxAMatrix& matrix, double factor);
-    void matrixAddToDiagonal(fbxsdk::FbxAMatrix& matrix, double value);
-    void matrixAdd(fbxsdk::FbxAMatrix& matrix, fbxsdk::FbxAMatrix& other);
+    void matrixScale(fbxsdk::FbxAMatrix& matrix, double factor);        ///< Multiplies all sixteen elements.
+    void matrixAddToDiagonal(fbxsdk::FbxAMatrix& matrix, double value); ///< Adds to the four elements of the diagonal.
+    void matrixAdd(fbxsdk::FbxAMatrix& matrix, fbxsdk::FbxAMatrix& other); ///< Adds element by element.
 
     // ---- Building a scene ----
     //
@@ -316,14 +331,16 @@ public:
     /// The time mode within 0.00001 of the rate, a custom one when there is none.
     bool setGlobalTimeSettings(fbxsdk::FbxScene* scene, float framesPerSecond);
 
-    // A node with its attribute, not below the root yet; null when an argument is.
-
+    /// Creates a node with its attribute, unparented and owned by the manager; null when a pointer is.
+    /// @{
     fbxsdk::FbxNode* createCamera(fbxsdk::FbxScene* scene, const std::string& name);
     fbxsdk::FbxNode* createNull(fbxsdk::FbxManager* manager, const std::string& name);
     fbxsdk::FbxNode* createLight(fbxsdk::FbxScene* scene, TnFbxLight::EFbxLightType type, const std::string& name);
-    /// The first set of points, and normals, texture coordinates and colours by polygon vertex where they are valid.
-    /// Null also for a mesh without polygons, points or polygon vertices, and for one whose polygons claim far more
-    /// polygon vertices than there are.
+    /// @}
+
+    /// As `createNull`, with the first set of points, and normals, texture coordinates and colours by polygon vertex
+    /// where they are valid. Null also for a mesh without polygons, points or polygon vertices, and for one whose
+    /// polygons claim far more polygon vertices than there are.
     fbxsdk::FbxNode* createMesh(fbxsdk::FbxManager* manager, const TnFbxMesh* mesh, const std::string& name);
 
     /// A texture mapped by the texture coordinates, as large as it is; null for a null scene.
@@ -340,13 +357,16 @@ public:
     /// channel's own rate. False for a null argument.
     bool setCurveValues(fbxsdk::FbxAnimCurve* curve, TnFbxChannel* channel, float scale) const;
 
-    // False for a null argument and for a node without the attribute of its kind.
-
-    /// Position, rotation, scale and rotation order; neither skew nor pivot.
+    /// Writes position, rotation, scale and rotation order; neither skew nor pivot. False for a null argument.
     bool setTransformCurveValues(fbxsdk::FbxNode* node, TnFbxTransform* transform);
+
+    /// Writes the channels and properties of the object, those of its transform included. False for a null
+    /// argument and for a node without the attribute of that kind.
+    /// @{
     bool setCameraCurveValues(fbxsdk::FbxNode* node, TnFbxCamera* camera);
     bool setLightCurveValues(fbxsdk::FbxNode* node, TnFbxLight* light);
     bool setNullCurveValues(fbxsdk::FbxNode* node, TnFbxNull* null);
+    /// @}
 
     // ---- Point caches and saving ----
 

@@ -18,29 +18,33 @@ namespace Tarnell::Fbx {
 class TARNELL_FBX_API TnFbxCamera : public TnFbxTransform {
 public:
     /// The channels. The look-at and the up point are positions in the space of the camera's own position, not
-    /// directions; roll and fields of view are in degrees, the focal length in millimetres, the aperture in the units
-    /// of the scene's camera.
+    /// directions. A faithful read hands out a direction in the up channels.
     enum EFbxCameraChannelType : int {
-        kFbxCameraLookAtPositionX,
-        kFbxCameraLookAtPositionY,
-        kFbxCameraLookAtPositionZ,
-        kFbxCameraUpPositionX,
-        kFbxCameraUpPositionY,
-        kFbxCameraUpPositionZ,
-        kFbxCameraRoll,
-        kFbxCameraFocalLength,
-        kFbxCameraApertureWidth,
-        kFbxCameraApertureHeight,
-        kFbxCameraNearPlane,
-        kFbxCameraFarPlane,
-        kFbxCameraFieldOfView,
-        kFbxCameraFieldOfViewX,
-        kFbxCameraFieldOfViewY,
-        kFbxCameraFilmOffsetX,
-        kFbxCameraFilmOffsetY
+        kFbxCameraLookAtPositionX, ///< X of the point that the camera looks at, scene units.
+        kFbxCameraLookAtPositionY, ///< Y of the point that the camera looks at, scene units.
+        kFbxCameraLookAtPositionZ, ///< Z of the point that the camera looks at, scene units.
+        kFbxCameraUpPositionX,     ///< X of the up point, scene units.
+        kFbxCameraUpPositionY,     ///< Y of the up point, scene units.
+        kFbxCameraUpPositionZ,     ///< Z of the up point, scene units.
+        kFbxCameraRoll,            ///< Degrees, about the viewing direction.
+        kFbxCameraFocalLength,     ///< Millimetres.
+        kFbxCameraApertureWidth,   ///< The film's width, in the unit of the file's camera: inches. See
+                                   ///< `kDefaultCameraApertureWidth`.
+        kFbxCameraApertureHeight,  ///< The film's height, in the same unit.
+        kFbxCameraNearPlane,       ///< Distance from the camera, scene units.
+        kFbxCameraFarPlane,        ///< Distance from the camera, scene units.
+        kFbxCameraFieldOfView,     ///< Degrees, horizontal or vertical as the aperture mode says.
+        kFbxCameraFieldOfViewX,    ///< Degrees, horizontal.
+        kFbxCameraFieldOfViewY,    ///< Degrees, vertical.
+        kFbxCameraFilmOffsetX,     ///< Inches, to the right.
+        kFbxCameraFilmOffsetY      ///< Inches, upwards.
     };
 
-    enum EFbxCameraProjectionType : int { kFbxCameraPerspective, kFbxCameraOrthographic };
+    /// The projection, numbered as in FBX.
+    enum EFbxCameraProjectionType : int {
+        kFbxCameraPerspective, ///< The default.
+        kFbxCameraOrthographic ///< Parallel; the zoom has no channel.
+    };
 
     /// Which values drive the lens, numbered as in FBX.
     enum EFbxCameraApertureMode : int {
@@ -50,6 +54,9 @@ public:
         kFbxApertureFocalLength            ///< The focal length.
     };
 
+    /// The static value of the channel of that name in a new camera. The film of 24.576 by 18.672, unlike any that was
+    /// read, is in millimetres; a faithful write takes it so.
+    /// @{
     static constexpr float kDefaultCameraLookAtPositionX = 0.0f;
     static constexpr float kDefaultCameraLookAtPositionY = 0.0f;
     static constexpr float kDefaultCameraLookAtPositionZ = 0.0f;
@@ -67,6 +74,7 @@ public:
     static constexpr float kDefaultCameraFieldOfViewY = 40.0f;
     static constexpr float kDefaultCameraFilmOffsetX = 0.0f;
     static constexpr float kDefaultCameraFilmOffsetY = 0.0f;
+    /// @}
 
     /// A default transform, every channel at its default, perspective, aperture mode focal length.
     TnFbxCamera();
@@ -82,16 +90,24 @@ public:
     /// The same, but with every static value 0, up vector and focal length included; always true.
     bool deleteCamera();
 
-    /// The static value of a channel, and all its samples at once (`TnFbxChannel::setAnimatedValues`, with its result).
-    /// False when there is no such channel; nothing changes then. A single sample is set through `getCameraChannel`.
+    /// Sets the static value of a channel. False when there is no such channel.
     bool setValue(EFbxCameraChannelType channel, float value);
+
+    /// Replaces all samples of a channel, as `TnFbxChannel::setAnimatedValues` and `moveAnimatedValues` do, with their
+    /// result. False also when there is no such channel; nothing changes then. A single sample is set through
+    /// `getCameraChannel`.
+    /// @{
     bool setValueAt(EFbxCameraChannelType channel, TnFbxTime time, const std::vector<float>& values);
     bool moveValuesAt(EFbxCameraChannelType channel, TnFbxTime time, std::vector<float>&& values);
+    /// @}
 
-    /// What a channel holds. Where there is no such channel: 0, 0, false and a default time record.
+    /// The static value of a channel; 0 when there is no such channel.
     float getValue(EFbxCameraChannelType channel) const;
+    /// The value at a frame, as `TnFbxChannel::getAnimatedValue` gives it; 0 when there is no such channel.
     float getValueAt(EFbxCameraChannelType channel, float frame) const;
+    /// Whether a channel has samples; false when there is no such channel.
     bool getAnimated(EFbxCameraChannelType channel) const;
+    /// A copy of the time record of a channel; a default one when there is no such channel.
     TnFbxTime getTime(EFbxCameraChannelType channel) const;
 
     /// The channel itself, owned by the camera; null when there is no such channel.
@@ -102,10 +118,12 @@ public:
     static const char* getChannelName(EFbxCameraChannelType channel);
 
     /// Stored without a check; always true.
+    /// @{
     bool setProjectionType(EFbxCameraProjectionType projectionType);
-    EFbxCameraProjectionType getProjectionType() const;
     bool setApertureMode(EFbxCameraApertureMode apertureMode);
-    EFbxCameraApertureMode getApertureMode() const;
+    /// @}
+    EFbxCameraProjectionType getProjectionType() const; ///< Default perspective.
+    EFbxCameraApertureMode getApertureMode() const;     ///< Default focal length.
 
     /// Scales a vector to unit length in place; one whose length is zero or NaN stays as it is.
     static void normalize(float& x, float& y, float& z);

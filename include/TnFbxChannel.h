@@ -20,7 +20,7 @@ namespace Tarnell::Fbx {
 /// Samples that are all equal, to the bit, take the memory of one.
 class TARNELL_FBX_API TnFbxChannel {
 public:
-    static constexpr float kDefaultChannelValue = 0.0f;
+    static constexpr float kDefaultChannelValue = 0.0f; ///< The static value of a new channel.
 
     /// The most samples that one `setValueAt` adds to those in memory, 2^25 (128 MiB): every whole frame that a float
     /// tells from its neighbours lies within as many.
@@ -30,20 +30,23 @@ public:
     TnFbxChannel();
     TnFbxChannel(const TnFbxChannel& other) = default;
     ~TnFbxChannel();
+    /// Copies the samples, the time record and the static value.
     TnFbxChannel& operator=(const TnFbxChannel& other);
 
-    /// Back to the state of a new channel, with `value` as the static value where it is given; always true.
+    /// Restores the state of a new channel, with `value` as the static value where it is given; always true.
     /// The memory of the samples is kept for the next ones.
+    /// @{
     bool initChannel();
     bool initChannel(float value);
     bool deleteChannel();
+    /// @}
 
     /// Removes the samples; the time record and the static value stay as they are. Always true.
     bool deleteAnimatedValues();
 
-    /// The static value, whether or not the channel is animated.
+    /// Sets the static value and nothing else; always true.
     bool setValue(float value);
-    float getValue() const;
+    float getValue() const; ///< The static value, whether or not the channel is animated.
 
     /// Sets the sample at one whole frame and makes the channel animated.
     ///
@@ -59,10 +62,13 @@ public:
     /// Replaces all samples: `values[k]` is the sample of frame `time.getStartFrame() + k`. The whole record is kept.
     ///
     /// False, and nothing changes, when the range is inverted, `values` is empty, the rate is zero or below, or there
-    /// are fewer values than frames. Values beyond the range are accepted and never read. Copied values
-    /// take the memory that the channel has, values that are moved in bring their own.
+    /// are fewer values than frames. Values beyond the range are accepted and never read. Copied values take the memory
+    /// that the channel has; `moveAnimatedValues` takes over that of the vector, which is left as moved from unless the
+    /// result is false.
+    /// @{
     bool setAnimatedValues(TnFbxTime time, const std::vector<float>& values);
     bool moveAnimatedValues(TnFbxTime time, std::vector<float>&& values);
+    /// @}
 
     /// The same with one value for every frame of the range. It takes the memory of one sample; what there was before
     /// is released.
@@ -74,7 +80,7 @@ public:
     /// next one, so that a fractional frame below zero is an extrapolation from the two samples to its right.
     float getAnimatedValue(float frame) const;
 
-    bool getAnimated() const;
+    bool getAnimated() const;  ///< Whether there are samples.
     TnFbxTime getTime() const; ///< A copy of the time record.
 
     /// Whether the value is the same at every frame: without samples, and where all are kept as one.

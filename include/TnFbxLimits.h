@@ -18,7 +18,7 @@ namespace Tarnell::Fbx {
 /// it began with. At first half of the machine's memory.
 TARNELL_FBX_API std::uint64_t memoryLimit();
 
-/// 0 restores the default.
+/// Sets what `memoryLimit()` says, in bytes; 0 restores the default.
 TARNELL_FBX_API void setMemoryLimit(std::uint64_t bytes);
 
 } // namespace Tarnell::Fbx

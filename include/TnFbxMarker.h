@@ -21,22 +21,30 @@ struct MarkerChannels;
 /// A marker. Its channels are reached only through the members below; no channel object is handed out.
 class TARNELL_FBX_API TnFbxMarker : public TnFbxTransform {
 public:
-    /// The channels: colour components from 0 to 1.
-    enum EFbxMarkerChannelType : int { kFbxMarkerRed, kFbxMarkerGreen, kFbxMarkerBlue, kFbxMarkerAlpha };
+    /// The channels: the components of the colour.
+    enum EFbxMarkerChannelType : int {
+        kFbxMarkerRed,   ///< From 0 to 1.
+        kFbxMarkerGreen, ///< From 0 to 1.
+        kFbxMarkerBlue,  ///< From 0 to 1.
+        kFbxMarkerAlpha  ///< From 0 (transparent) to 1 (opaque).
+    };
 
     /// The display shape, numbered as the first four of FBX; its others read as cubes.
     enum EFbxMarkerLookType : int {
-        kFbxMarkerLookCube,
-        kFbxMarkerLookHardCross,
-        kFbxMarkerLookLightCross,
-        kFbxMarkerLookSphere
+        kFbxMarkerLookCube,       ///< A cube. The default.
+        kFbxMarkerLookHardCross,  ///< A cross of beams.
+        kFbxMarkerLookLightCross, ///< A cross of lines.
+        kFbxMarkerLookSphere      ///< A sphere.
     };
 
+    /// The static value of the channel, or the size, of a new marker.
+    /// @{
     static constexpr float kDefaultMarkerRed = 1.0f;
     static constexpr float kDefaultMarkerGreen = 1.0f;
     static constexpr float kDefaultMarkerBlue = 1.0f;
     static constexpr float kDefaultMarkerAlpha = 1.0f;
     static constexpr float kDefaultMarkerSize = 1.0f;
+    /// @}
 
     /// A default transform, opaque white, a cube of size 1.
     TnFbxMarker();
@@ -52,26 +60,35 @@ public:
     /// The same, but with every static value 0; always true.
     bool deleteMarker();
 
-    /// The static value of a channel, and all its samples at once (`TnFbxChannel::setAnimatedValues`, with its result).
-    /// False when there is no such channel; nothing changes then.
+    /// Sets the static value of a channel. False when there is no such channel.
     bool setValue(EFbxMarkerChannelType channel, float value);
+
+    /// Replaces all samples of a channel, as `TnFbxChannel::setAnimatedValues` and `moveAnimatedValues` do, with their
+    /// result. False also when there is no such channel; nothing changes then.
+    /// @{
     bool setValueAt(EFbxMarkerChannelType channel, TnFbxTime time, const std::vector<float>& values);
     bool moveValuesAt(EFbxMarkerChannelType channel, TnFbxTime time, std::vector<float>&& values);
+    /// @}
 
-    /// What a channel holds. Where there is no such channel: 0, 0, false and a default time record.
+    /// The static value of a channel; 0 when there is no such channel.
     float getValue(EFbxMarkerChannelType channel) const;
+    /// The value at a frame, as `TnFbxChannel::getAnimatedValue` gives it; 0 when there is no such channel.
     float getValueAt(EFbxMarkerChannelType channel, float frame) const;
+    /// Whether a channel has samples; false when there is no such channel.
     bool getAnimated(EFbxMarkerChannelType channel) const;
+    /// A copy of the time record of a channel; a default one when there is no such channel.
     TnFbxTime getTime(EFbxMarkerChannelType channel) const;
 
     /// The channel's printable name, a constant; null when there is no such channel.
     static const char* getChannelName(EFbxMarkerChannelType channel);
 
     /// Stored without a check; always true.
+    /// @{
     bool setMarkerSize(float size);
-    float getMarkerSize() const; ///< Display size, scene units.
     bool setMarkerLookType(EFbxMarkerLookType lookType);
-    EFbxMarkerLookType getMarkerLookType() const;
+    /// @}
+    float getMarkerSize() const;                  ///< Display size, scene units. Default 1.
+    EFbxMarkerLookType getMarkerLookType() const; ///< Default cube.
 
 private:
     friend struct detail::MarkerChannels; // for the library: hosts reach channels through the operations above

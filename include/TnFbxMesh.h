@@ -22,7 +22,8 @@ class MeshArrays;
 /// points + j. Points are in centimetres where the mesh was read from a file.
 class TARNELL_FBX_API TnFbxMesh : public TnFbxTransform {
 public:
-    /// A new control point, normal, texture coordinate and colour.
+    /// A component of a new control point (P), normal (N), texture coordinate (U, V) or colour.
+    /// @{
     static constexpr float kDefaultMeshPX = 0.0f;
     static constexpr float kDefaultMeshPY = 0.0f;
     static constexpr float kDefaultMeshPZ = 0.0f;
@@ -35,6 +36,7 @@ public:
     static constexpr float kDefaultMeshGreen = 1.0f;
     static constexpr float kDefaultMeshBlue = 1.0f;
     static constexpr float kDefaultMeshAlpha = 1.0f;
+    /// @}
 
     /// A default transform and no geometry.
     TnFbxMesh();
@@ -44,9 +46,11 @@ public:
     /// Copies the geometry; the target keeps its own transform and name.
     TnFbxMesh& operator=(const TnFbxMesh& other);
 
-    /// Both remove the geometry; its memory is kept and the transform stays as it is. Always true.
+    /// Removes the geometry; its memory is kept and the transform stays as it is. Always true.
+    /// @{
     bool initMesh();
     bool deleteMesh();
+    /// @}
 
     /// Sizes all arrays for one set of control points: polygon sizes, point indices, points, normals and texture
     /// coordinates of 0, colours of opaque white. The flags stay false until they are set.
@@ -59,42 +63,53 @@ public:
     /// Declares one more set, whose points the caller appends with `addControlPoint`; always true.
     bool addControlPointSet();
 
-    /// One element of an array; control points are counted through all sets. False when there is no such element;
+    /// Sets one element of an array; control points are counted through all sets. False when there is no such element;
     /// nothing changes then. What is stored is not checked: a point index may name a point that does not exist.
+    /// @{
     bool setPolygonVertexSize(int polygon, int size);
     bool setPointIndex(int polygonVertex, int controlPoint);
     bool setControlPoint(int index, float x, float y, float z);
     bool setNormal(int polygonVertex, float x, float y, float z);
     bool setUV(int polygonVertex, float u, float v);
     bool setColour(int polygonVertex, float red, float green, float blue, float alpha);
+    /// @}
 
     int getPolygonVertexSize(int polygon) const; ///< −1 when there is no such polygon: no polygon has that size.
     int getPointIndex(int polygonVertex) const;  ///< 0, a valid point, when there is no such polygon vertex.
 
-    /// False when there is no such element; the outputs are untouched then.
+    /// Gets one element of an array; control points are counted through all sets. False when there is no such element;
+    /// the outputs are untouched then.
+    /// @{
     bool getControlPoint(int index, float& x, float& y, float& z) const;
     bool getNormal(int polygonVertex, float& x, float& y, float& z) const;
     bool getUV(int polygonVertex, float& u, float& v) const;
     bool getColour(int polygonVertex, float& red, float& green, float& blue, float& alpha) const;
+    /// @}
 
-    /// Whether the array carries data; the setters are always true.
+    /// Says whether the array carries data; always true.
+    /// @{
     bool setValidNormals(bool valid);
-    bool getValidNormals() const;
     bool setValidUVs(bool valid);
-    bool getValidUVs() const;
     bool setValidColours(bool valid);
+    /// @}
+    /// Whether the array carries data: false in a new mesh and where the file had none, whatever the size of the array.
+    /// @{
+    bool getValidNormals() const;
+    bool getValidUVs() const;
     bool getValidColours() const;
+    /// @}
 
-    /// Whether the points are multiplied by the mesh's transform already, as a faithful read with
-    /// `setTransformPoints(true)` leaves them: a faithful write takes it out of them again. Default false; the setter
-    /// is always true.
+    /// Says whether the points are multiplied by the mesh's transform already; always true.
     bool setPointsPlaced(bool placed);
+    /// True after a faithful read with `setTransformPoints(true)`: a faithful write takes the transform out of the
+    /// points again. Default false.
     bool getPointsPlaced() const;
 
-    int getNumberOfPolygons() const;
-    int getNumberOfPolygonVertices() const;
-    int getNumberOfControlPoints() const; ///< Of one set.
-    int getNumberOfControlPointSets() const;
+    int getNumberOfPolygons() const;        ///< The length of the polygon sizes.
+    int getNumberOfPolygonVertices() const; ///< The length of the point indices.
+    int getNumberOfControlPoints() const;   ///< Of one set.
+    int
+    getNumberOfControlPointSets() const; ///< One per frame where the points are animated, else 1; 0 without geometry.
 
 private:
     friend class detail::MeshArrays;

@@ -13,9 +13,12 @@ namespace Tarnell::Fbx {
 class TARNELL_FBX_API TnFbxNull : public TnFbxTransform {
 public:
     /// The display shape, numbered as in FBX.
-    enum EFbxNullLookType : int { kFbxNullLookNone, kFbxNullLookCross };
+    enum EFbxNullLookType : int {
+        kFbxNullLookNone, ///< Not drawn.
+        kFbxNullLookCross ///< Three lines that cross. The default.
+    };
 
-    static constexpr float kDefaultNullSize = 1.0f;
+    static constexpr float kDefaultNullSize = 1.0f; ///< The size of a new null, scene units.
 
     /// A default transform, a cross of size 1.
     TnFbxNull();
@@ -25,15 +28,19 @@ public:
     /// Copies the size and the look; the target keeps its own transform and name.
     TnFbxNull& operator=(const TnFbxNull& other);
 
-    /// Both go back to a cross of size 1; the transform stays as it is. Always true.
+    /// Restores a cross of size 1; the transform stays as it is. Always true.
+    /// @{
     bool initNull();
     bool deleteNull();
+    /// @}
 
     /// Stored without a check; always true.
+    /// @{
     bool setNullSize(float size);
-    float getNullSize() const; ///< Display size, scene units.
     bool setNullLookType(EFbxNullLookType lookType);
-    EFbxNullLookType getNullLookType() const;
+    /// @}
+    float getNullSize() const;                ///< Display size, scene units. Default 1.
+    EFbxNullLookType getNullLookType() const; ///< Default cross.
 
 private:
     struct Properties {

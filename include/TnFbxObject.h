@@ -13,17 +13,22 @@ namespace Tarnell::Fbx {
 /// A named scene object. Nothing but its destruction is virtual.
 class TARNELL_FBX_API TnFbxObject {
 public:
+    /// An empty name.
     TnFbxObject();
     TnFbxObject(const TnFbxObject& other) = default;
     virtual ~TnFbxObject();
+    /// Copies the name.
     TnFbxObject& operator=(const TnFbxObject& other);
 
-    /// Both empty the name; always true.
+    /// Empties the name; always true.
+    /// @{
     bool initObject();
     bool deleteObject();
+    /// @}
 
+    /// Any UTF-8 text; names need not be unique within a file. Always true.
     bool setName(const std::string& name);
-    const std::string& getName() const; ///< Valid as long as the object is and its name does not change.
+    const std::string& getName() const; ///< UTF-8. The reference is valid for the life of the object.
 
 private:
     std::string mName;

@@ -14,58 +14,61 @@ namespace Tarnell::Fbx {
 /// Read options: storage, defaults and copying, nothing else.
 class TARNELL_FBX_API TnFbxReadInfo {
 public:
-    static constexpr float kDefaultSampleFPS = 24.0f;
-    static constexpr float kDefaultFrame = 0.0f;
+    static constexpr float kDefaultSampleFPS = 24.0f; ///< Frames per second of new options.
+    static constexpr float kDefaultFrame = 0.0f;      ///< The frame of new options.
 
+    /// No file, no animation stack, and the defaults that the getters name.
     TnFbxReadInfo();
     TnFbxReadInfo(const TnFbxReadInfo& other) = default;
     ~TnFbxReadInfo();
+    /// Copies every option.
     TnFbxReadInfo& operator=(const TnFbxReadInfo& other);
 
-    /// Both go back to the state of new options; always true.
+    /// Restores the state of new options; always true.
+    /// @{
     bool initReadInfo();
     bool deleteReadInfo();
+    /// @}
 
-    /// Every setter stores what it is given, without a check, and is always true. Strings stay valid until they are set
-    /// again.
+    /// Stores what it is given, without a check; always true. What the option means is said at its getter.
+    /// @{
     bool setFileName(const std::string& fileName);
-    const std::string& getFileName() const; ///< FBX file to read.
-
     bool setAnimationStackName(const std::string& animationStackName);
-    const std::string& getAimationStackName() const; ///< Spelt without the n; empty: no animation stack chosen.
-    bool haveAnimationStack() const;                 ///< Whether an animation stack name is set.
-
     bool setGlobalTransform(bool globalTransform);
+    bool setTransformPoints(bool transformPoints);
+    bool setUseSampleFPS(bool useSampleFPS);
+    bool setSampleFPS(float sampleFPS);
+    bool setFrame(float frame);
+    bool setComputeCameraRotation(bool computeCameraRotation);
+    bool setAllObjects(bool allObjects);
+    bool setObjectName(const std::string& objectName);
+    bool setObjectID(int objectID);
+    bool setFidelity(EFbxFidelity fidelity);
+    /// @}
+
+    const std::string& getFileName() const; ///< FBX file to read. Default empty.
+
+    /// The animation stack to read. Spelt without the n: hosts call it so. Empty means none is chosen, and then a
+    /// compatible read fails while a faithful one takes the first. A compatible read takes the first whatever the name.
+    const std::string& getAimationStackName() const;
+    bool haveAnimationStack() const; ///< Whether an animation stack name is set.
+
     bool getGlobalTransform() const; ///< Transforms are read in the world, not relative to their parents. Default true.
 
-    bool setTransformPoints(bool transformPoints);
-    /// Mesh points are multiplied by their node's transform. Default true. Points of a skin are in the world without
-    /// it, and would be moved twice: switch it off to get them where the application shows them.
+    /// Mesh points are multiplied by their node's transform. Default true. A compatible read hands out the points of
+    /// skins in the world, where this would move them twice: switch it off for these.
     bool getTransformPoints() const;
 
-    bool setUseSampleFPS(bool useSampleFPS);
     bool getUseSampleFPS() const; ///< Sampled at `getSampleFPS` instead of the scene's own rate. Default false.
+    float getSampleFPS() const;   ///< Frames per second. Default 24.
+    float getFrame() const;       ///< The frame at which static values and meshes are taken. Default 0.
 
-    bool setSampleFPS(float sampleFPS);
-    float getSampleFPS() const; ///< Frames per second.
-
-    bool setFrame(float frame);
-    float getFrame() const; ///< The frame at which static values are taken.
-
-    bool setComputeCameraRotation(bool computeCameraRotation);
     bool getComputeCameraRotation() const; ///< Camera rotations come from the look-at values. Default false.
 
-    bool setAllObjects(bool allObjects);
     bool getAllObjects() const; ///< Every object of the kind, not only the one called `getObjectName`. Default true.
+    const std::string& getObjectName() const; ///< Name of the single object to read, compared exactly.
+    int getObjectID() const;                  ///< Kept for the host; the library does not read it. Default −1.
 
-    bool setObjectName(const std::string& objectName);
-    const std::string& getObjectName() const; ///< Name of the single object to read.
-
-    bool setObjectID(int objectID);
-    int getObjectID() const; ///< Kept for the host; the library does not read it. Default −1.
-
-    /// Faithful: the stack of the name, an empty one meaning the first; every channel complete or a failure.
-    bool setFidelity(EFbxFidelity fidelity);
     EFbxFidelity getFidelity() const; ///< What the values stand for; see docs/faithful.md. Default compatible.
 
 private:

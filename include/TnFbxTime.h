@@ -15,8 +15,8 @@ namespace Tarnell::Fbx {
 /// need.
 class TARNELL_FBX_API TnFbxTime {
 public:
-    static constexpr float kDefaultTimeFrame = 0.0f;
-    static constexpr float kDefaultTimeFrameRate = 24.0f;
+    static constexpr float kDefaultTimeFrame = 0.0f;      ///< The current frame of a new record.
+    static constexpr float kDefaultTimeFrameRate = 24.0f; ///< Frames per second of a new record.
 
     /// Frame 0, range 0 to 0, 24 frames per second.
     TnFbxTime();
@@ -24,25 +24,31 @@ public:
     ~TnFbxTime();
     TnFbxTime& operator=(const TnFbxTime& other) = default;
 
-    /// Both go back to the state of a new record; always true.
+    /// Restores the state of a new record; always true.
+    /// @{
     bool initTime();
     bool deleteTime();
+    /// @}
 
-    /// Store what is given, without a check; always true. The frame and the rate change only together with the rest.
+    /// Stores what is given, without a check; always true. The frame and the rate change only together with the rest.
+    /// @{
     bool setTime(float frame, int startFrame, int endFrame, float frameRate);
     bool setStartFrame(int startFrame);
     bool setEndFrame(int endFrame);
+    /// @}
 
     float getFrame() const;     ///< The current frame, possibly fractional.
     int getStartFrame() const;  ///< First frame of the range.
     int getEndFrame() const;    ///< Last frame of the range, inclusive.
     float getFrameRate() const; ///< Frames per second.
 
-    /// The frame, the start and the end in seconds: frame ÷ rate in single precision, with no rounding and no offset.
-    /// A rate of 0 gives the infinity or the NaN of that division.
+    /// The current frame, the first or the last one in seconds: frame ÷ rate in single precision, with no rounding and
+    /// no offset. A rate of 0 gives the infinity or the NaN of that division.
+    /// @{
     float getTime() const;
     float getStartTime() const;
     float getEndTime() const;
+    /// @}
 
 private:
     float mFrame;

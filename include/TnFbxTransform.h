@@ -19,37 +19,41 @@ class TARNELL_FBX_API TnFbxTransform : public TnFbxObject {
 public:
     /// The channels. Rotations are in degrees.
     enum EFbxTransformChannelType : int {
-        kFbxTransformPositionX,
-        kFbxTransformPositionY,
-        kFbxTransformPositionZ,
-        kFbxTransformRotationX,
-        kFbxTransformRotationY,
-        kFbxTransformRotationZ,
-        kFbxTransformScaleX,
-        kFbxTransformScaleY,
-        kFbxTransformScaleZ,
-        kFbxTransformSkewX,
-        kFbxTransformSkewY,
-        kFbxTransformSkewZ,
-        kFbxTransformPivotX,
-        kFbxTransformPivotY,
-        kFbxTransformPivotZ
+        kFbxTransformPositionX, ///< Scene units; centimetres in what was read.
+        kFbxTransformPositionY, ///< Scene units; centimetres in what was read.
+        kFbxTransformPositionZ, ///< Scene units; centimetres in what was read.
+        kFbxTransformRotationX, ///< Degrees, about the axis.
+        kFbxTransformRotationY, ///< Degrees, about the axis.
+        kFbxTransformRotationZ, ///< Degrees, about the axis.
+        kFbxTransformScaleX,    ///< A factor; 1 leaves the size as it is.
+        kFbxTransformScaleY,    ///< A factor; 1 leaves the size as it is.
+        kFbxTransformScaleZ,    ///< A factor; 1 leaves the size as it is.
+        kFbxTransformSkewX,     ///< How much of Y is added to X.
+        kFbxTransformSkewY,     ///< How much of Z is added to X.
+        kFbxTransformSkewZ,     ///< How much of Z is added to Y.
+        kFbxTransformPivotX,    ///< Scene units; 0 in what was read faithfully.
+        kFbxTransformPivotY,    ///< Scene units; 0 in what was read faithfully.
+        kFbxTransformPivotZ     ///< Scene units; 0 in what was read faithfully.
     };
 
     /// The order in which the three Euler rotations are applied. The numbers are the library's own: FBX numbers YZX
     /// before YXZ.
     enum EFbxTransformRotationOrder : int {
-        kFbxRotationOrderXYZ,
-        kFbxRotationOrderXZY,
-        kFbxRotationOrderYXZ,
-        kFbxRotationOrderYZX,
-        kFbxRotationOrderZXY,
-        kFbxRotationOrderZYX
+        kFbxRotationOrderXYZ, ///< About X first, then Y, then Z.
+        kFbxRotationOrderXZY, ///< About X first, then Z, then Y.
+        kFbxRotationOrderYXZ, ///< About Y first, then X, then Z.
+        kFbxRotationOrderYZX, ///< About Y first, then Z, then X.
+        kFbxRotationOrderZXY, ///< About Z first, then X, then Y. The default.
+        kFbxRotationOrderZYX  ///< About Z first, then Y, then X.
     };
 
     /// The order of the scale, rotation and translation stages. Kept for the host; the library does not interpret it.
-    enum EFbxTransformTransformOrder : int { kFbxTransformOrderDefault };
+    enum EFbxTransformTransformOrder : int {
+        kFbxTransformOrderDefault ///< The only one.
+    };
 
+    /// The static value of the channel of that name in a new transform.
+    /// @{
     static constexpr float kDefaultTransformPositionX = 0.0f;
     static constexpr float kDefaultTransformPositionY = 0.0f;
     static constexpr float kDefaultTransformPositionZ = 0.0f;
@@ -65,6 +69,7 @@ public:
     static constexpr float kDefaultTransformPivotX = 0.0f;
     static constexpr float kDefaultTransformPivotY = 0.0f;
     static constexpr float kDefaultTransformPivotZ = 0.0f;
+    /// @}
 
     /// No name, every channel at its default, rotation order ZXY.
     TnFbxTransform();
@@ -80,17 +85,24 @@ public:
     /// The same, but with every static value 0, those of the scale included; always true.
     bool deleteTransform();
 
-    /// The static value of a channel, and all its samples at once (`TnFbxChannel::setAnimatedValues`, with its result).
-    /// False when there is no such channel; nothing changes then. A single sample is set through
-    /// `getTransformChannel`.
+    /// Sets the static value of a channel. False when there is no such channel.
     bool setTransformValue(EFbxTransformChannelType channel, float value);
+
+    /// Replaces all samples of a channel, as `TnFbxChannel::setAnimatedValues` and `moveAnimatedValues` do, with their
+    /// result. False also when there is no such channel; nothing changes then. A single sample is set through
+    /// `getTransformChannel`.
+    /// @{
     bool setTransformValueAt(EFbxTransformChannelType channel, TnFbxTime time, const std::vector<float>& values);
     bool moveTransformValuesAt(EFbxTransformChannelType channel, TnFbxTime time, std::vector<float>&& values);
+    /// @}
 
-    /// What a channel holds. Where there is no such channel: 0, 0, false and a default time record.
+    /// The static value of a channel; 0 when there is no such channel.
     float getTransformValue(EFbxTransformChannelType channel) const;
+    /// The value at a frame, as `TnFbxChannel::getAnimatedValue` gives it; 0 when there is no such channel.
     float getTransformValueAt(EFbxTransformChannelType channel, float frame) const;
+    /// Whether a channel has samples; false when there is no such channel.
     bool getTransformAnimated(EFbxTransformChannelType channel) const;
+    /// A copy of the time record of a channel; a default one when there is no such channel.
     TnFbxTime getTransformTime(EFbxTransformChannelType channel) const;
 
     /// The channel itself, owned by the transform; null when there is no such channel.
@@ -100,10 +112,12 @@ public:
     static const char* getTransformChannelName(EFbxTransformChannelType channel);
 
     /// Stored without a check; always true.
+    /// @{
     bool setTransformRotationOrder(EFbxTransformRotationOrder order);
-    EFbxTransformRotationOrder getTransformRotationOrder() const;
     bool setTransformTransformOrder(EFbxTransformTransformOrder order);
-    EFbxTransformTransformOrder getTransformTransformOrder() const;
+    /// @}
+    EFbxTransformRotationOrder getTransformRotationOrder() const;   ///< Default ZXY.
+    EFbxTransformTransformOrder getTransformTransformOrder() const; ///< Kept for the host.
 
 private:
     struct Properties {

@@ -16,18 +16,19 @@ class TARNELL_FBX_API TnFbxWriteInfo {
 public:
     /// The version of the written file; values above the last one mean the last one.
     enum eCompatibilityVersion : int {
-        kFbxVersion2010,
-        kFbxVersion2011,
-        kFbxVersion2012,
-        kFbxVersion2013,
-        kFbxVersion2014,
-        kFbxVersion2016
+        kFbxVersion2010, ///< File version 6.1.
+        kFbxVersion2011, ///< File version 7.1.
+        kFbxVersion2012, ///< File version 7.2.
+        kFbxVersion2013, ///< File version 7.3.
+        kFbxVersion2014, ///< File version 7.4.
+        kFbxVersion2016  ///< File version 7.5. The default.
     };
 
-    static constexpr float kDefaultFPS = 24.0f;
-    static constexpr float kDefaultStartFrame = 1.0f;
-    static constexpr float kDefaultEndFrame = 1.0f;
+    static constexpr float kDefaultFPS = 24.0f;       ///< Frames per second of new options.
+    static constexpr float kDefaultStartFrame = 1.0f; ///< The first frame of new options.
+    static constexpr float kDefaultEndFrame = 1.0f;   ///< The last frame of new options.
 
+    /// No file, no animation stack, and the defaults that the getters name.
     TnFbxWriteInfo();
     TnFbxWriteInfo(const TnFbxWriteInfo& other) = default;
     ~TnFbxWriteInfo();
@@ -35,59 +36,67 @@ public:
     /// Copies every option except the compatibility version: a host that copies options sets the version explicitly.
     TnFbxWriteInfo& operator=(const TnFbxWriteInfo& other);
 
-    /// Both go back to the state of new options; always true.
+    /// Restores the state of new options; always true.
+    /// @{
     bool initWriteInfo();
     bool deleteWriteInfo();
+    /// @}
 
-    /// Every setter stores what it is given, without a check, and is always true. Strings stay valid until they are set
-    /// again.
+    /// Stores what it is given, without a check; always true. What the option means is said at its getter.
+    /// @{
     bool setFileName(const std::string& fileName);
+    bool setAnimationStackName(const std::string& animationStackName);
+    bool setFileFormat(bool fileFormat);
+    bool setWriteCameras(bool writeCameras);
+    bool setWriteLights(bool writeLights);
+    bool setWriteTransforms(bool writeTransforms);
+    bool setWriteNulls(bool writeNulls);
+    bool setWriteMeshes(bool writeMeshes);
+    bool setAnimateMeshVertices(bool animateMeshVertices);
+    bool setMayaVertexCacheFormat(bool mayaVertexCacheFormat);
+    bool setFPS(float framesPerSecond);
+    bool setStartFrame(float startFrame);
+    bool setEndFrame(float endFrame);
+    bool setCompatibilityVersion(eCompatibilityVersion compatibilityVersion);
+    bool setFidelity(EFbxFidelity fidelity);
+    bool setComputeCameraRotation(bool computeCameraRotation);
+    /// @}
+
     const std::string& getFileName() const; ///< FBX file to write; point caches are named after it.
 
-    bool setAnimationStackName(const std::string& animationStackName);
-    const std::string& getAnimationStackName() const; ///< Of a faithful write, where an empty one is "Take 001".
+    /// The name of the animation stack in a faithful write; empty means "Take 001". A compatible write fails without a
+    /// name and calls the stack "Take 001" whatever the name.
+    const std::string& getAnimationStackName() const;
 
-    bool setFileFormat(bool fileFormat);
     bool getFileFormat() const; ///< True: ASCII; false: binary. Default true.
 
-    /// Which kinds of objects are written. Default: all.
-    bool setWriteCameras(bool writeCameras);
+    /// Whether objects of the kind are written. Default true.
+    /// @{
     bool getWriteCameras() const;
-    bool setWriteLights(bool writeLights);
     bool getWriteLights() const;
-    bool setWriteTransforms(bool writeTransforms);
     bool getWriteTransforms() const;
-    bool setWriteNulls(bool writeNulls);
     bool getWriteNulls() const;
-    bool setWriteMeshes(bool writeMeshes);
     bool getWriteMeshes() const;
+    /// @}
 
-    bool setAnimateMeshVertices(bool animateMeshVertices);
-    bool getAnimateMeshVertices() const; ///< Animated mesh points are written as point caches. Default true.
-
-    bool setMayaVertexCacheFormat(bool mayaVertexCacheFormat);
+    bool getAnimateMeshVertices() const;   ///< Animated mesh points are written as point caches. Default true.
     bool getMayaVertexCacheFormat() const; ///< True: Maya caches; false: Max ".pc2" caches. Default true.
 
-    bool setFPS(float framesPerSecond);
-    float getFPS() const; ///< Frames per second.
+    float getFPS() const; ///< Frames per second. Default 24.
 
-    /// First and last frame; their fractions are dropped. Point caches have a sample for each of them, and the span of
-    /// the file reaches from the first to the last, and beyond as far as there are keys. Frames 1 to 1, the default,
-    /// say nothing about the span. Channels are written over their own ranges in any case.
-    bool setStartFrame(float startFrame);
+    /// The first or last frame. A compatible write drops fractions; in a faithful one they belong to the span. Point
+    /// caches have a sample for each frame, and the span of the file reaches from the first to the last, and beyond as
+    /// far as there are keys. Frames 1 to 1, the default, say nothing about the span. Channels are written over their
+    /// own ranges in any case.
+    /// @{
     float getStartFrame() const;
-    bool setEndFrame(float endFrame);
     float getEndFrame() const;
+    /// @}
 
-    bool setCompatibilityVersion(eCompatibilityVersion compatibilityVersion);
     eCompatibilityVersion getCompatibilityVersion() const; ///< Default `kFbxVersion2016`.
 
-    /// Faithful: what is written comes back; the stack bears its name, and fractions of the first and last frame belong
-    /// to the span.
-    bool setFidelity(EFbxFidelity fidelity);
     EFbxFidelity getFidelity() const; ///< What the file says of the objects; see docs/faithful.md. Default compatible.
 
-    bool setComputeCameraRotation(bool computeCameraRotation);
     /// A faithful write turns cameras that have a look-at point and no rotation toward the point. Default true.
     bool getComputeCameraRotation() const;
 
