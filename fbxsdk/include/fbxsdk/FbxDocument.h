@@ -8,6 +8,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
+/// What can be imported and exported as a whole. Scenes are the only documents.
 class FBXSDK_DLL FbxDocument : public FbxCollection {
     FBXSDK_OBJECT_DECLARE(FbxDocument, FbxCollection)
 

@@ -13,26 +13,34 @@ FBXSDK_NAMESPACE_BEGIN
 
 class FbxDocument;
 
+/// Writes a scene into an FBX file: Initialize names the file, Export makes it.
 class FBXSDK_DLL FbxExporter : public FbxIOBase {
     FBXSDK_OBJECT_DECLARE(FbxExporter, FbxIOBase)
 
 public:
     /// Takes the name of the file to write and the format's number in the registry. A format of -1 goes by the
-    /// extension; a name without one that is known means the native writer. No file is made before Export.
-    /// False for a null or empty name, for a number that is no writer, and when the folder is not there; GetStatus then
-    /// says why. A version that was set before stays.
+    /// extension; a name without one that is known means the native writer. No file is made before Export. False for a
+    /// null or empty name, for a number that is no writer, when the folder is not there and when a folder bears the
+    /// name; GetStatus then says why. A version that was set before stays.
     bool Initialize(const char* pFileName, int pFileFormat = -1, FbxIOSettings* pIOSettings = nullptr) override;
 
-    /// Writes the document, which must be a scene. False, with a status, when it cannot.
+    /// Writes the document, which must be a scene, with everything that is its member except the root node. The file
+    /// gets its name when all of it is written: until then, and after a failure, an older file of the name stays as it
+    /// was. Point caches that were written for the scene get their names in the same step.
+    ///
+    /// False, with a status, before Initialize, for a document that is no scene, when the disk or the memory does not
+    /// suffice, and when the scene cannot be put into the format. Large meshes are compressed on all cores; the threads
+    /// end before the call returns.
     bool Export(FbxDocument* pDocument, bool pNonBlocking = false);
 
     /// One of the strings of GetCurrentWritableVersions; false for any other, and the version stays as it was. Without
     /// a call the newest one is written. Names are never changed, whatever the mode.
     bool SetFileExportVersion(FbxString pVersion,
                               FbxSceneRenamer::ERenamingMode pRenamingMode = FbxSceneRenamer::eNone);
-    /// Ended by null.
+    /// "FBX201000" and so on, oldest first, ended by null; the same for both formats. Valid for the whole run of the
+    /// program.
     [[nodiscard]] char const* const* GetCurrentWritableVersions() const;
-    /// -1 before Initialize.
+    /// The writer's number in the registry; -1 before Initialize and after it failed.
     [[nodiscard]] int GetFileFormat() const { return mFileFormat; }
 
 private:

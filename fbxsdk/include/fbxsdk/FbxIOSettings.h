@@ -9,31 +9,51 @@
 
 #include <fbxsdk/FbxObject.h>
 
+/// The name that hosts give their settings object; any other does as well.
 #define IOSROOT "IOSRoot"
+/// The path of the option: read materials.
 #define IMP_FBX_MATERIAL "Import|AdvOptGrp|FileFormat|Fbx|Material"
+/// The path of the option: read textures.
 #define IMP_FBX_TEXTURE "Import|AdvOptGrp|FileFormat|Fbx|Texture"
+/// The path of the option: read skins and their clusters.
 #define IMP_FBX_LINK "Import|AdvOptGrp|FileFormat|Fbx|Link"
+/// The path of the option: read blend shapes.
 #define IMP_FBX_SHAPE "Import|AdvOptGrp|FileFormat|Fbx|Shape"
+/// The path of the option: read the images that lights project.
 #define IMP_FBX_GOBO "Import|AdvOptGrp|FileFormat|Fbx|Gobo"
+/// The path of the option: read animation.
 #define IMP_FBX_ANIMATION "Import|AdvOptGrp|FileFormat|Fbx|Animation"
+/// The path of the option: read the global settings.
 #define IMP_FBX_GLOBAL_SETTINGS "Import|AdvOptGrp|FileFormat|Fbx|Global_Settings"
+/// The path of the option: write materials.
 #define EXP_FBX_MATERIAL "Export|AdvOptGrp|Fbx|Material"
+/// The path of the option: write textures.
 #define EXP_FBX_TEXTURE "Export|AdvOptGrp|Fbx|Texture"
+/// The path of the option: put media into the file.
 #define EXP_FBX_EMBEDDED "Export|AdvOptGrp|Fbx|EMBEDDED"
+/// The path of the option: write blend shapes.
 #define EXP_FBX_SHAPE "Export|AdvOptGrp|Fbx|Shape"
+/// The path of the option: write the images that lights project.
 #define EXP_FBX_GOBO "Export|AdvOptGrp|Fbx|Gobo"
+/// The path of the option: write animation.
 #define EXP_FBX_ANIMATION "Export|AdvOptGrp|Fbx|Animation"
+/// The path of the option: write the global settings.
 #define EXP_FBX_GLOBAL_SETTINGS "Export|AdvOptGrp|Fbx|Global_Settings"
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// Settings take effect only where they are handed to an importer or exporter. Setting an unknown path does nothing;
-/// asking for one gives the default passed along.
+/// Options of import and export: true or false under paths that are known beforehand.
+///
+/// Importers and exporters accept settings and do not follow them: everything is read and written, and media are not
+/// embedded. Setting an unknown path does nothing; asking for one gives the default passed along.
 class FBXSDK_DLL FbxIOSettings : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxIOSettings, FbxObject)
 
 public:
+    /// Sets the option of that path, one of the IMP_FBX_… and EXP_FBX_… macros; nothing happens for any other and for
+    /// null.
     void SetBoolProp(const char* pName, bool pValue);
+    /// The option of that path: true until set, for EXP_FBX_EMBEDDED false; pDefValue for an unknown path and null.
     [[nodiscard]] bool GetBoolProp(const char* pName, bool pDefValue) const;
 
 private:

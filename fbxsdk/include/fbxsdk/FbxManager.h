@@ -17,29 +17,36 @@ namespace detail {
 class ManagerData;
 }
 
+/// The owner of every object.
+///
 /// Any number of managers may exist at once; they share nothing. One manager and its objects are used by one thread at
-/// a time.
+/// a time. Ended by Destroy alone; FbxManager is never deleted directly.
 class FBXSDK_DLL FbxManager {
 public:
+    /// A new manager without objects. Never null: where memory runs out std::bad_alloc is thrown.
     static FbxManager* Create();
-    FbxManager(const FbxManager&) = delete;
-    FbxManager& operator=(const FbxManager&) = delete;
+    FbxManager(const FbxManager&) = delete;            ///< Managers are not copied.
+    FbxManager& operator=(const FbxManager&) = delete; ///< Managers are not assigned.
 
-    /// Destroys every object of the manager, then the manager.
+    /// Destroys every object of the manager, whatever state it is in, then the manager. All pointers to them are
+    /// invalid afterwards.
     virtual void Destroy();
 
+    /// The list of formats; never null, lives as long as the manager.
     [[nodiscard]] FbxIOPluginRegistry* GetIOPluginRegistry() const;
-    /// Null until set. The settings stay the caller's.
+    /// Null until set. The settings stay the caller's; once they are destroyed the answer is null again.
     [[nodiscard]] virtual FbxIOSettings* GetIOSettings() const;
+    /// Keeps the pointer for GetIOSettings. Reading and writing do not follow the settings.
     virtual void SetIOSettings(FbxIOSettings* pIOSettings);
+    /// The name and version of this platform; the same in both forms.
     static const char* GetVersion(bool pFull = true);
 
     /// The platform's own view of the manager.
     [[nodiscard]] detail::ManagerData& data() const { return *mData; }
 
 protected:
-    FbxManager();
-    virtual ~FbxManager();
+    FbxManager();          ///< For Create.
+    virtual ~FbxManager(); ///< For Destroy.
 
 private:
     std::unique_ptr<detail::ManagerData> mData;

@@ -33,21 +33,35 @@ struct NodePivots;
 enum class PivotVector : unsigned char;
 } // namespace detail
 
+/// A place in the scene's tree: a transform, children, attributes (what stands there) and materials.
+///
 /// Children, attributes and materials are the node's source objects of those classes, in order of connection. A node
 /// has at most one parent and is never below itself: a connection that would make it so is cut again at once, and a
-/// node that is connected to a second parent leaves the first.
+/// node that is connected to a second parent leaves the first. Angles are degrees; lengths are units of the scene
+/// (FbxGlobalSettings::GetSystemUnit).
 class FBXSDK_DLL FbxNode : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxNode, FbxObject)
 
 public:
-    enum EShadingMode { eHardShading, eWireFrame, eFlatShading, eLightShading, eTextureShading, eFullShading };
-    /// The source set is what files hold and what is evaluated; the destination set is stored and no more.
-    enum EPivotSet { eSourcePivot, eDestinationPivot };
+    /// How the node is drawn; stored and written, of no effect on anything else.
+    enum EShadingMode {
+        eHardShading,    ///< the default
+        eWireFrame,      ///< edges alone
+        eFlatShading,    ///< one shade for each polygon
+        eLightShading,   ///< lit, without textures
+        eTextureShading, ///< lit, with textures
+        eFullShading     ///< all that the application can do
+    };
+    /// The source set is what files hold and what is evaluated; the destination set is stored in memory and no more.
+    enum EPivotSet {
+        eSourcePivot,     ///< the set in force
+        eDestinationPivot ///< a second set for conversions by hosts
+    };
 
-    FbxPropertyT<FbxDouble3> LclTranslation;
-    FbxPropertyT<FbxDouble3> LclRotation; ///< Euler angles, degrees
-    FbxPropertyT<FbxDouble3> LclScaling;
-    FbxPropertyT<FbxDouble> Visibility; ///< 0 hidden, 1 visible
+    FbxPropertyT<FbxDouble3> LclTranslation; ///< relative to the parent, scene units; (0, 0, 0); animatable
+    FbxPropertyT<FbxDouble3> LclRotation;    ///< Euler angles in the node's order, degrees; (0, 0, 0); animatable
+    FbxPropertyT<FbxDouble3> LclScaling;     ///< factors; (1, 1, 1); animatable
+    FbxPropertyT<FbxDouble> Visibility;      ///< 0 hidden, 1 visible (the default); animatable
 
     // Hierarchy.
 
@@ -55,108 +69,150 @@ public:
     /// keeps its place. In a scene, what was in none joins the scene. False for null, the node itself and its
     /// ancestors.
     bool AddChild(FbxNode* pNode);
-    /// Returns the node, or null when it is no child.
+    /// Takes the node from this one; it stays a member of the scene, without a parent. Returns the node, or null when
+    /// it is no child.
     FbxNode* RemoveChild(FbxNode* pNode);
     /// Of direct children, or of everything below the node.
     [[nodiscard]] int GetChildCount(bool pRecursive = false) const;
-    /// Null out of range.
+    /// The child at that place in order of connection; null out of range.
     [[nodiscard]] FbxNode* GetChild(int pIndex);
+    /// The same for a node that is not changed.
     [[nodiscard]] const FbxNode* GetChild(int pIndex) const;
-    [[nodiscard]] FbxNode* GetParent() { return mParent; }
-    [[nodiscard]] const FbxNode* GetParent() const { return mParent; }
-    /// The first node of the name below this one, each node before its children; null when there is none. Names have no
-    /// history here: the initial name is the name.
+    [[nodiscard]] FbxNode* GetParent() { return mParent; } ///< Null for the root node and for a node without a parent.
+    [[nodiscard]] const FbxNode* GetParent() const { return mParent; } ///< The same for a node that is not changed.
+    /// The first node of the name below this one, each node before its children; among the children alone without
+    /// pRecursive. Null when there is none and for a null name. Names have no history here: the initial name is the
+    /// name.
     [[nodiscard]] FbxNode* FindChild(const char* pName, bool pRecursive = true, bool pInitial = false);
 
     // Attributes.
 
-    /// Replaces the default attribute, and returns the one that was; null removes it.
+    /// Makes the attribute the default one and disconnects the one that was, which is returned (null when there was
+    /// none) and still belongs to its manager and scene. Null only removes.
     FbxNodeAttribute* SetNodeAttribute(FbxNodeAttribute* pNodeAttribute);
-    /// The default attribute: that of the property DefaultAttributeIndex when it names one, else the first.
+    /// The default attribute: that of the property DefaultAttributeIndex when it names one, else the first. Null
+    /// without attributes.
     [[nodiscard]] FbxNodeAttribute* GetNodeAttribute();
+    /// The same for a node that is not changed.
     [[nodiscard]] const FbxNodeAttribute* GetNodeAttribute() const;
-    [[nodiscard]] int GetNodeAttributeCount() const;
+    [[nodiscard]] int GetNodeAttributeCount() const; ///< How many attributes stand on the node; mostly none or one.
+    /// The attribute at that place in order of connection; null out of range.
     [[nodiscard]] FbxNodeAttribute* GetNodeAttributeByIndex(int pIndex);
+    /// The same for a node that is not changed.
     [[nodiscard]] const FbxNodeAttribute* GetNodeAttributeByIndex(int pIndex) const;
 
-    // The default attribute when it is of that class, else null.
+    /// The default attribute when it is a mesh, else null.
     [[nodiscard]] FbxMesh* GetMesh();
+    /// The default attribute when it is a camera, stereo cameras included, else null.
     [[nodiscard]] FbxCamera* GetCamera();
+    /// The default attribute when it is a light, else null.
     [[nodiscard]] FbxLight* GetLight();
+    /// The default attribute when it is a null, else null; null also for a node without attributes.
     [[nodiscard]] FbxNull* GetNull();
+    /// The default attribute when it is a marker, else null.
     [[nodiscard]] FbxMarker* GetMarker();
+    /// The default attribute when it is a bone, else null.
     [[nodiscard]] FbxSkeleton* GetSkeleton();
+    /// The default attribute when it is geometry of any kind, else null.
     [[nodiscard]] FbxGeometry* GetGeometry();
 
-    // Targets: the nodes that this one's X axis and up vector follow. Null when there is none.
+    /// Makes the node the one that this node's X axis points at, in place of any other; null removes it. Stored and
+    /// written; evaluation does not follow it.
     void SetTarget(FbxNode* pNode);
-    [[nodiscard]] FbxNode* GetTarget() const;
+    [[nodiscard]] FbxNode* GetTarget() const; ///< Null when there is none.
+    /// Makes the node the one that this node's up vector points at; otherwise as SetTarget.
     void SetTargetUp(FbxNode* pNode);
-    [[nodiscard]] FbxNode* GetTargetUp() const;
+    [[nodiscard]] FbxNode* GetTargetUp() const; ///< Null when there is none.
 
-    void SetShadingMode(EShadingMode pShadingMode) { mShadingMode = pShadingMode; }
-    [[nodiscard]] EShadingMode GetShadingMode() const { return mShadingMode; }
+    void SetShadingMode(EShadingMode pShadingMode) { mShadingMode = pShadingMode; } ///< Any value is stored.
+    [[nodiscard]] EShadingMode GetShadingMode() const { return mShadingMode; }      ///< eHardShading by default.
 
     // Materials.
 
-    /// The material's index, also when it is there already; -1 for null.
+    /// Connects the material behind those that there are. The material's index, also when it is there already; -1 for
+    /// null.
     int AddMaterial(FbxSurfaceMaterial* pMaterial);
-    [[nodiscard]] int GetMaterialCount() const;
-    /// Null out of range.
+    [[nodiscard]] int GetMaterialCount() const; ///< How many materials layer elements of materials can point at.
+    /// The material at that place in order of connection; null out of range.
     [[nodiscard]] FbxSurfaceMaterial* GetMaterial(int pIndex) const;
 
     // Transform. Vectors come as (x, y, z, 1), the w of what is set is ignored. A reference stays valid until the same
     // value is asked for again. A number from a file that is no order or inherit type counts as the first.
 
+    /// The order in which the angles of LclRotation are applied; in force when rotation is active.
     void SetRotationOrder(EPivotSet pPivotSet, EFbxRotationOrder pRotationOrder);
+    /// Sets pRotationOrder to the order that is stored, in force or not. A number from a file that is no order counts
+    /// as XYZ.
     void GetRotationOrder(EPivotSet pPivotSet, EFbxRotationOrder& pRotationOrder) const;
-    /// Whether rotation order, pre- and post-rotation and rotation limits are in force.
+    /// Whether rotation order, pre- and post-rotation and rotation limits are in force; false by default. Both sets
+    /// share it.
     void SetRotationActive(bool pVal);
-    [[nodiscard]] bool GetRotationActive() const;
+    [[nodiscard]] bool GetRotationActive() const; ///< Whether they are in force.
+    /// With true, rotation order, pre- and post-rotation serve the limits alone and do not turn the node.
     void SetRotationSpaceForLimitOnly(EPivotSet pPivotSet, bool pUseForLimitOnly);
-    [[nodiscard]] bool GetRotationSpaceForLimitOnly(EPivotSet pPivotSet) const;
+    [[nodiscard]] bool GetRotationSpaceForLimitOnly(EPivotSet pPivotSet) const; ///< False by default.
+    /// Turns the node after its own rotation: degrees, always applied X, Y, Z. In force when rotation is active.
     void SetPreRotation(EPivotSet pPivotSet, FbxVector4 pVector);
-    [[nodiscard]] const FbxVector4& GetPreRotation(EPivotSet pPivotSet) const;
+    [[nodiscard]] const FbxVector4& GetPreRotation(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
+    /// Its inverse turns the node before its own rotation: degrees, always applied X, Y, Z. In force when rotation is
+    /// active.
     void SetPostRotation(EPivotSet pPivotSet, FbxVector4 pVector);
-    [[nodiscard]] const FbxVector4& GetPostRotation(EPivotSet pPivotSet) const;
+    [[nodiscard]] const FbxVector4& GetPostRotation(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
+    /// Added to the translation, outside of the rotation about the pivot; applications keep a node in place with it
+    /// when they move its pivot. Scene units.
     void SetRotationOffset(EPivotSet pPivotSet, FbxVector4 pVector);
-    [[nodiscard]] const FbxVector4& GetRotationOffset(EPivotSet pPivotSet) const;
+    [[nodiscard]] const FbxVector4& GetRotationOffset(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
+    /// The point about which the node turns, scene units.
     void SetRotationPivot(EPivotSet pPivotSet, FbxVector4 pVector);
-    [[nodiscard]] const FbxVector4& GetRotationPivot(EPivotSet pPivotSet) const;
+    [[nodiscard]] const FbxVector4& GetRotationPivot(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
+    /// Added inside of the rotation and outside of the scaling about the pivot; the counterpart of the rotation offset.
+    /// Scene units.
     void SetScalingOffset(EPivotSet pPivotSet, FbxVector4 pVector);
-    [[nodiscard]] const FbxVector4& GetScalingOffset(EPivotSet pPivotSet) const;
+    [[nodiscard]] const FbxVector4& GetScalingOffset(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
+    /// The point about which the node is scaled, scene units.
     void SetScalingPivot(EPivotSet pPivotSet, FbxVector4 pVector);
-    [[nodiscard]] const FbxVector4& GetScalingPivot(EPivotSet pPivotSet) const;
+    [[nodiscard]] const FbxVector4& GetScalingPivot(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
 
-    // Of the node's attributes only; children do not inherit it, and the transform matrices do not contain it.
+    /// Moves the node's attributes only: children do not inherit it, and the transform matrices do not contain it.
+    /// Scene units.
     void SetGeometricTranslation(EPivotSet pPivotSet, FbxVector4 pVector);
-    [[nodiscard]] FbxVector4 GetGeometricTranslation(EPivotSet pPivotSet) const;
+    [[nodiscard]] FbxVector4 GetGeometricTranslation(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
+    /// Turns the node's attributes only: degrees, applied X, Y, Z.
     void SetGeometricRotation(EPivotSet pPivotSet, FbxVector4 pVector);
-    [[nodiscard]] FbxVector4 GetGeometricRotation(EPivotSet pPivotSet) const;
+    [[nodiscard]] FbxVector4 GetGeometricRotation(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
+    /// Scales the node's attributes only.
     void SetGeometricScaling(EPivotSet pPivotSet, FbxVector4 pVector);
-    [[nodiscard]] FbxVector4 GetGeometricScaling(EPivotSet pPivotSet) const;
+    [[nodiscard]] FbxVector4 GetGeometricScaling(EPivotSet pPivotSet) const; ///< (1, 1, 1, 1) by default.
 
+    /// How the parent's scaling is taken over; eInheritRrSs by default.
     void SetTransformationInheritType(FbxTransform::EInheritType pInheritType);
+    /// Sets pInheritType to what is stored. A number from a file that is no inherit type counts as eInheritRrSs.
     void GetTransformationInheritType(FbxTransform::EInheritType& pInheritType) const;
 
     // Evaluation, over all layers of the scene's current stack; the static values at FBXSDK_TIME_INFINITE. The matrix
     // is the node's own until it is evaluated again. Targets do not enter, and nothing needs to be forced: changes are
     // seen.
 
+    /// The node's transform in the world at a time. The matrix is the node's own until it is evaluated again. The last
+    /// three arguments have no effect.
     FbxAMatrix& EvaluateGlobalTransform(FbxTime pTime = FBXSDK_TIME_INFINITE,
                                         FbxNode::EPivotSet pPivotSet = FbxNode::eSourcePivot, bool pApplyTarget = false,
                                         bool pForceEval = false);
+    /// The node's transform relative to its parent at a time: translation, pivots, rotation and scaling in one.
+    /// Otherwise the same, in a matrix of its own.
     FbxAMatrix& EvaluateLocalTransform(FbxTime pTime = FBXSDK_TIME_INFINITE,
                                        FbxNode::EPivotSet pPivotSet = FbxNode::eSourcePivot, bool pApplyTarget = false,
                                        bool pForceEval = false);
-    /// Widens the interval by the keys of the node, its attributes and everything below it, on one layer of the stack
-    /// (null: the scene's current one). False, and nothing changed, when there are no keys or no such layer.
+    /// Widens the interval by the keys of the node, its attributes, their shape channels and everything below it, on
+    /// one layer of the stack (null: the scene's current one). False, and nothing changed, when there are no keys or no
+    /// such layer.
     bool GetAnimationInterval(FbxTimeSpan& pInterval, FbxAnimStack* pAnimStack = nullptr, int pAnimLayerId = 0);
 
     /// The platform's own evaluation state of the node.
     [[nodiscard]] detail::NodeEvaluation& evaluation();
 
 protected:
+    /// Keeps parent, children, attributes and materials in step with the connections.
     void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:

@@ -21,27 +21,33 @@ namespace detail {
 struct SceneData;
 }
 
+/// A node tree, settings, and every object that belongs to them. The objects are the scene's members, its sources in
+/// order of entry; they go with it.
 class FBXSDK_DLL FbxScene : public FbxDocument {
     FBXSDK_OBJECT_DECLARE(FbxScene, FbxDocument)
 
 public:
-    /// There from the start: "RootNode", without attribute, at the identity. It is not saved.
+    /// The node above all others; never null. There from the start: "RootNode", without attribute, at the identity. It
+    /// is not saved.
     [[nodiscard]] FbxNode* GetRootNode() const;
 
-    [[nodiscard]] FbxGlobalSettings& GetGlobalSettings();
-    [[nodiscard]] const FbxGlobalSettings& GetGlobalSettings() const;
+    [[nodiscard]] FbxGlobalSettings& GetGlobalSettings(); ///< Axes, unit, time mode; they live as long as the scene.
+    [[nodiscard]] const FbxGlobalSettings& GetGlobalSettings() const; ///< The same for a scene that is not changed.
+    /// Ambient light and fog; they live as long as the scene.
     [[nodiscard]] FbxGlobalLightSettings& GlobalLightSettings();
-    [[nodiscard]] FbxGlobalCameraSettings& GlobalCameraSettings();
-    [[nodiscard]] FbxGlobalTimeSettings& GlobalTimeSettings();
+    [[nodiscard]] FbxGlobalCameraSettings& GlobalCameraSettings(); ///< The default camera and the producer cameras.
+    [[nodiscard]] FbxGlobalTimeSettings& GlobalTimeSettings();     ///< The time mode as files before 7.x have it.
 
-    /// All nodes in order of entry, the root first, those that hang nowhere included.
+    /// How many nodes are members: the root, everything below it, and nodes without a parent, as those of the producer
+    /// cameras.
     [[nodiscard]] int GetNodeCount() const;
-    /// Null out of range.
+    /// The node at that place in order of entry, the root first; null out of range.
     [[nodiscard]] FbxNode* GetNode(int pIndex) const;
 
-    /// The stack that transforms are evaluated with: the one set, else the scene's first; null without any. Setting
-    /// null means the first again; a stack that is not the scene's changes nothing.
+    /// The stack that transforms and properties are evaluated with. Null means the scene's first one; a stack that is
+    /// not the scene's changes nothing. Its name becomes the document's ActiveAnimStackName.
     void SetCurrentAnimationStack(FbxAnimStack* pAnimStack);
+    /// The stack that was set, else the scene's first, whatever ActiveAnimStackName says; null without any.
     [[nodiscard]] FbxAnimStack* GetCurrentAnimationStack() const;
 
     /// The platform's own view of the scene.
