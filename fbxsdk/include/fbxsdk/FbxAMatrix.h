@@ -9,22 +9,24 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// Sixteen contiguous doubles, m[row][column].
+/// An affine transform as sixteen contiguous doubles, m[row][column].
 ///
 /// Rows 0, 1, 2 are the images of the x, y and z axes, row 3 is the translation, column 3 is (0, 0, 0, 1). Products and
 /// formulas read as with column vectors all the same: `(a * b).MultT(v) == a.MultT(b.MultT(v))`.
 ///
-/// Euler angles are in degrees and always of order XYZ. The w of vector arguments is ignored.
+/// Euler angles are in degrees and always of order XYZ. The w of vector arguments is ignored, that of results is 1.
 class FBXSDK_DLL FbxAMatrix : public FbxDouble4x4 {
 public:
-    FbxAMatrix() { SetIdentity(); }
+    FbxAMatrix() { SetIdentity(); } ///< The identity.
+    /// Translation, rotation and scaling, as SetTRS.
     FbxAMatrix(const FbxVector4& pT, const FbxVector4& pR, const FbxVector4& pS) { SetTRS(pT, pR, pS); }
 
+    /// Row pY, column pX, 0 to 3 each; not checked.
     [[nodiscard]] double Get(int pY, int pX) const { return mData[pY][pX]; }
-    [[nodiscard]] FbxVector4 GetRow(int pY) const { return mData[pY]; }
-    [[nodiscard]] FbxVector4 GetColumn(int pX) const;
+    [[nodiscard]] FbxVector4 GetRow(int pY) const { return mData[pY]; } ///< 0 to 3; not checked.
+    [[nodiscard]] FbxVector4 GetColumn(int pX) const;                   ///< 0 to 3; not checked.
 
-    [[nodiscard]] FbxVector4 GetT() const;
+    [[nodiscard]] FbxVector4 GetT() const; ///< The translation.
     /// Euler angles of the axes made unit length. At a pitch of ±90° the turn is all given to x, and z is 0.
     ///
     /// An axis scaled to zero is taken perpendicular to the others; when two or three are gone, what cannot be known
@@ -32,15 +34,17 @@ public:
     [[nodiscard]] FbxVector4 GetR() const;
     /// Lengths of the axes; all three negative when the matrix mirrors.
     [[nodiscard]] FbxVector4 GetS() const;
-    [[nodiscard]] FbxQuaternion GetQ() const;
+    [[nodiscard]] FbxQuaternion GetQ() const; ///< The same rotation as GetR, of length 1.
 
-    void SetIdentity();
-    // Each of these replaces its own part and keeps the other two.
+    void SetIdentity(); ///< No translation, no rotation, scale 1.
+    /// Replaces the translation and keeps rotation and scale.
     void SetT(const FbxVector4& pT);
-    void SetR(const FbxVector4& pR);
-    void SetS(const FbxVector4& pS);
-    void SetQ(const FbxQuaternion& pQ);
+    void SetR(const FbxVector4& pR);    ///< Replaces the rotation by Euler angles and keeps the other two.
+    void SetS(const FbxVector4& pS);    ///< Replaces the scale and keeps the other two; shear is lost.
+    void SetQ(const FbxQuaternion& pQ); ///< Replaces the rotation and keeps the other two.
+    /// Replaces everything: scales first, then turns, then moves.
     void SetTRS(const FbxVector4& pT, const FbxVector4& pR, const FbxVector4& pS);
+    /// The same with the rotation as a quaternion.
     void SetTQS(const FbxVector4& pT, const FbxQuaternion& pQ, const FbxVector4& pS);
 
     /// The transformed point. No division by w; the result has the argument's w.
@@ -52,28 +56,31 @@ public:
 
     /// The full product of all sixteen elements; the right matrix acts first.
     FbxAMatrix operator*(const FbxAMatrix& pOther) const;
+    /// The full product; the argument acts first.
     FbxAMatrix& operator*=(const FbxAMatrix& pOther) { return *this = *this * pOther; }
 
-    // Scalars act on all sixteen elements.
+    /// Scalars act on all sixteen elements; what comes of it is affine no more, unless the scalar is 1.
     FbxAMatrix operator*(double pValue) const;
-    FbxAMatrix operator/(double pValue) const;
-    FbxAMatrix operator-() const { return *this * -1.0; }
-    FbxAMatrix& operator*=(double pValue) { return *this = *this * pValue; }
-    FbxAMatrix& operator/=(double pValue) { return *this = *this / pValue; }
+    FbxAMatrix operator/(double pValue) const;                               ///< All sixteen divided.
+    FbxAMatrix operator-() const { return *this * -1.0; }                    ///< All sixteen negated.
+    FbxAMatrix& operator*=(double pValue) { return *this = *this * pValue; } ///< All sixteen multiplied.
+    FbxAMatrix& operator/=(double pValue) { return *this = *this / pValue; } ///< All sixteen divided.
 
     /// The inverse of the affine part; the identity when there is none.
     [[nodiscard]] FbxAMatrix Inverse() const;
-    [[nodiscard]] FbxAMatrix Transpose() const;
-    /// Rotation on the shorter way at constant speed, translation and scale in a straight line.
+    [[nodiscard]] FbxAMatrix Transpose() const; ///< Rows become columns; with a translation the result is not affine.
+    /// Between this matrix (weight 0) and the other one (weight 1): rotation on the shorter way at constant speed,
+    /// translation and scale in a straight line.
     [[nodiscard]] FbxAMatrix Slerp(const FbxAMatrix& pOther, double pWeight) const;
 
     /// Equal when no element differs by more than FBXSDK_TOLERANCE.
     bool operator==(const FbxAMatrix& pOther) const;
-    bool operator!=(const FbxAMatrix& pOther) const { return !(*this == pOther); }
+    bool operator!=(const FbxAMatrix& pOther) const { return !(*this == pOther); } ///< The opposite.
+    /// Whether no element differs from the identity by more than the threshold.
     [[nodiscard]] bool IsIdentity(const double pThreshold = FBXSDK_TOLERANCE) const;
 
-    operator double*() { return mData[0].mData; }
-    operator const double*() const { return mData[0].mData; }
+    operator double*() { return mData[0].mData; }             ///< The sixteen elements, row by row.
+    operator const double*() const { return mData[0].mData; } ///< The same for reading.
     using FbxDouble4x4::operator[];
 };
 

@@ -10,23 +10,42 @@ FBXSDK_NAMESPACE_BEGIN
 
 class FbxAnimCurveNode;
 
+/// A layer of a stack: a collection of curve nodes. The first layer of a stack, its base layer, replaces the static
+/// values of what it animates; each further one adds to what is below it, or overrides it, by its weight.
 class FBXSDK_DLL FbxAnimLayer : public FbxCollection {
     FBXSDK_OBJECT_DECLARE(FbxAnimLayer, FbxCollection)
 
 public:
-    enum EBlendMode { eBlendAdditive, eBlendOverride, eBlendOverridePassthrough };
-    enum ERotationAccumulationMode { eRotationByLayer, eRotationByChannel };
-    enum EScaleAccumulationMode { eScaleMultiply, eScaleAdditive };
+    /// How the layer's values meet those below.
+    enum EBlendMode {
+        eBlendAdditive,           ///< they are added, by weight
+        eBlendOverride,           ///< they replace them, whatever the weight
+        eBlendOverridePassthrough ///< they replace them by weight
+    };
+    /// How LclRotation adds up.
+    enum ERotationAccumulationMode {
+        eRotationByLayer,  ///< as rotations, one applied after the other
+        eRotationByChannel ///< angle by angle
+    };
+    /// How LclScaling adds up.
+    enum EScaleAccumulationMode {
+        eScaleMultiply, ///< by products
+        eScaleAdditive  ///< by sums
+    };
 
-    FbxPropertyT<FbxDouble> Weight; ///< percent
-    FbxPropertyT<FbxBool> Mute, Solo, Lock;
-    FbxPropertyT<FbxDouble3> Color;
-    FbxPropertyT<FbxEnum> BlendMode, RotationAccumulationMode, ScaleAccumulationMode;
+    FbxPropertyT<FbxDouble> Weight;  ///< percent, 0 to 100; 100, animatable. Of no effect on the base layer
+    FbxPropertyT<FbxBool> Mute,      ///< true: the layer does not count
+        Solo,                        ///< true: only layers with it count
+        Lock;                        ///< true: applications do not edit the layer
+    FbxPropertyT<FbxDouble3> Color;  ///< for display, 0 to 1; (0.8, 0.8, 0.8)
+    FbxPropertyT<FbxEnum> BlendMode, ///< EBlendMode; eBlendAdditive
+        RotationAccumulationMode,    ///< ERotationAccumulationMode; eRotationByLayer
+        ScaleAccumulationMode;       ///< EScaleAccumulationMode; eScaleMultiply
 
-    void Reset();
-    /// With the bypass on, values of that type override instead of blending.
+    void Reset(); ///< Sets all of these and the bypasses to their defaults; curves stay.
+    /// With the bypass on, values of that type override instead of blending. Types that are none are ignored.
     void SetBlendModeBypass(EFbxType pType, bool pState);
-    [[nodiscard]] bool GetBlendModeBypass(EFbxType pType) const;
+    [[nodiscard]] bool GetBlendModeBypass(EFbxType pType) const; ///< False by default and for types that are none.
 
     /// The layer's curve node for the property, made when there is none, also when the property is not marked as
     /// animatable; null for an invalid property and one that holds no number.

@@ -8,11 +8,14 @@
 #include <cstdint>
 
 #if defined(FBXSDK_BUILDING)
+/// Marks what the shared library exports.
 #define FBXSDK_DLL __attribute__((visibility("default")))
 #else
+/// Marks what the shared library exports.
 #define FBXSDK_DLL
 #endif
 
+/// The namespace of the API, for sources that write it by this macro.
 #define FBXSDK_NAMESPACE fbxsdk
 
 /// The platform's classes stand in an inline namespace: the sources read `fbxsdk::FbxNode` as documented, while the
@@ -20,24 +23,25 @@
 #define FBXSDK_NAMESPACE_BEGIN                                                                                         \
     namespace fbxsdk {                                                                                                 \
     inline namespace tarnell {
+/// Ends what FBXSDK_NAMESPACE_BEGIN began.
 #define FBXSDK_NAMESPACE_END                                                                                           \
     }                                                                                                                  \
     }
 
 FBXSDK_NAMESPACE_BEGIN
 
-using FbxBool = bool;
-using FbxChar = signed char;
-using FbxUChar = unsigned char;
-using FbxShort = short;
-using FbxUShort = unsigned short;
-using FbxInt = int;
-using FbxUInt = unsigned int;
-using FbxLongLong = std::int64_t;
-using FbxULongLong = std::uint64_t;
-using FbxFloat = float;
-using FbxDouble = double;
-using FbxEnum = int;
-using FbxReference = void*;
+using FbxBool = bool;               ///< True or false.
+using FbxChar = signed char;        ///< 8 bits with sign.
+using FbxUChar = unsigned char;     ///< 8 bits without sign.
+using FbxShort = short;             ///< 16 bits with sign.
+using FbxUShort = unsigned short;   ///< 16 bits without sign.
+using FbxInt = int;                 ///< 32 bits with sign.
+using FbxUInt = unsigned int;       ///< 32 bits without sign.
+using FbxLongLong = std::int64_t;   ///< 64 bits with sign.
+using FbxULongLong = std::uint64_t; ///< 64 bits without sign.
+using FbxFloat = float;             ///< Single precision.
+using FbxDouble = double;           ///< Double precision.
+using FbxEnum = int;                ///< The number of an enumerator.
+using FbxReference = void*;         ///< A pointer to anything.
 
 FBXSDK_NAMESPACE_END

@@ -14,26 +14,28 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
+/// A growing array with the API's `int` indices. Indices of elements are checked by assertions alone. References to
+/// elements are valid until the count grows.
 template <typename T>
 class FbxArray {
     static_assert(!std::is_same<T, bool>::value, "elements are handed out by reference; packed bits cannot be");
 
 public:
-    FbxArray() = default;
+    FbxArray() = default; ///< No elements.
     /// Room for that many elements; the array is empty.
     explicit FbxArray(int pCapacity) { Reserve(pCapacity); }
 
-    [[nodiscard]] int GetCount() const { return static_cast<int>(mItems.size()); }
-    [[nodiscard]] int Size() const { return GetCount(); }
+    [[nodiscard]] int GetCount() const { return static_cast<int>(mItems.size()); } ///< How many elements there are.
+    [[nodiscard]] int Size() const { return GetCount(); }                          ///< The same.
 
-    T& operator[](int pIndex) { return mItems[checked(pIndex)]; }
-    const T& operator[](int pIndex) const { return mItems[checked(pIndex)]; }
-    [[nodiscard]] T GetAt(int pIndex) const { return mItems[checked(pIndex)]; }
-    void SetAt(int pIndex, const T& pElement) { mItems[checked(pIndex)] = pElement; }
-    [[nodiscard]] T GetFirst() const { return GetAt(0); }
-    [[nodiscard]] T GetLast() const { return GetAt(GetCount() - 1); }
-    [[nodiscard]] T* GetArray() { return mItems.data(); }
-    [[nodiscard]] const T* GetArray() const { return mItems.data(); }
+    T& operator[](int pIndex) { return mItems[checked(pIndex)]; }               ///< The element must exist.
+    const T& operator[](int pIndex) const { return mItems[checked(pIndex)]; }   ///< The element must exist.
+    [[nodiscard]] T GetAt(int pIndex) const { return mItems[checked(pIndex)]; } ///< A copy; the element must exist.
+    void SetAt(int pIndex, const T& pElement) { mItems[checked(pIndex)] = pElement; } ///< The element must exist.
+    [[nodiscard]] T GetFirst() const { return GetAt(0); }                             ///< There must be one.
+    [[nodiscard]] T GetLast() const { return GetAt(GetCount() - 1); }                 ///< There must be one.
+    [[nodiscard]] T* GetArray() { return mItems.data(); } ///< All elements in a row; valid until the count grows.
+    [[nodiscard]] const T* GetArray() const { return mItems.data(); } ///< The same for reading.
 
     /// The index of the first equal element at or after the start; -1 when there is none.
     [[nodiscard]] int Find(const T& pElement, int pStartIndex = 0) const {
@@ -49,6 +51,7 @@ public:
         mItems.push_back(pElement);
         return GetCount() - 1;
     }
+    /// Appends the element unless an equal one is there; its index in both cases.
     int AddUnique(const T& pElement) {
         const int found = Find(pElement);
         return found >= 0 ? found : Add(pElement);
@@ -62,25 +65,29 @@ public:
         mItems.insert(mItems.begin() + index, pElement);
         return index;
     }
+    /// Takes the element out and returns it; it must exist.
     T RemoveAt(int pIndex) {
         const T removed = GetAt(pIndex);
         mItems.erase(mItems.begin() + pIndex);
         return removed;
     }
+    /// Takes the last element out and returns it; there must be one.
     T RemoveLast() { return RemoveAt(GetCount() - 1); }
 
+    /// Makes room, so that so many elements can be added without moving; the count stays. Negative counts as 0.
     void Reserve(int pCapacity) { mItems.reserve(static_cast<size_t>(std::max(pCapacity, 0))); }
-    /// New elements are value-initialised.
+    /// New elements are value-initialised. Negative counts as 0.
     void Resize(int pCount) { mItems.resize(static_cast<size_t>(std::max(pCount, 0))); }
-    void Clear() { mItems.clear(); }
+    void Clear() { mItems.clear(); } ///< Removes all elements.
 
-    [[nodiscard]] auto begin() { return mItems.begin(); }
-    [[nodiscard]] auto end() { return mItems.end(); }
-    [[nodiscard]] auto begin() const { return mItems.begin(); }
-    [[nodiscard]] auto end() const { return mItems.end(); }
+    [[nodiscard]] auto begin() { return mItems.begin(); }       ///< For loops over all elements.
+    [[nodiscard]] auto end() { return mItems.end(); }           ///< For loops over all elements.
+    [[nodiscard]] auto begin() const { return mItems.begin(); } ///< The same for reading.
+    [[nodiscard]] auto end() const { return mItems.end(); }     ///< The same for reading.
 
+    /// As many elements, equal one by one.
     bool operator==(const FbxArray& pOther) const { return mItems == pOther.mItems; }
-    bool operator!=(const FbxArray& pOther) const { return !(*this == pOther); }
+    bool operator!=(const FbxArray& pOther) const { return !(*this == pOther); } ///< The opposite.
 
 private:
     [[nodiscard]] size_t checked(int pIndex) const {

@@ -8,13 +8,14 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
+/// The switcher: which of the scene's cameras is live. A scene has one at most, in FbxGlobalCameraSettings.
 class FBXSDK_DLL FbxCameraSwitcher : public FbxNodeAttribute {
     FBXSDK_OBJECT_DECLARE(FbxCameraSwitcher, FbxNodeAttribute)
 
 public:
-    FbxPropertyT<FbxInt> CameraIndex;
+    FbxPropertyT<FbxInt> CameraIndex; ///< in files "Camera Index"; the number of the live camera, animatable
 
-    [[nodiscard]] EType GetAttributeType() const override;
+    [[nodiscard]] EType GetAttributeType() const override; ///< eCameraSwitcher.
 };
 
 FBXSDK_NAMESPACE_END

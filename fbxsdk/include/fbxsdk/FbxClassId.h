@@ -15,20 +15,21 @@ struct ClassInfo;
 /// The identity of a class of objects. Cheap to copy; compares by identity.
 class FBXSDK_DLL FbxClassId {
 public:
-    constexpr FbxClassId() = default;
-    explicit constexpr FbxClassId(const detail::ClassInfo* pInfo) : mInfo(pInfo) {}
+    constexpr FbxClassId() = default;                                               ///< The invalid id.
+    explicit constexpr FbxClassId(const detail::ClassInfo* pInfo) : mInfo(pInfo) {} ///< The platform's own.
 
-    /// True for the same class and when this class derives from the other.
+    /// True for the same class and when this class derives from the other; false when either is invalid.
     [[nodiscard]] bool Is(const FbxClassId& pId) const;
     /// "FbxNode", "FbxCamera", …; empty for an invalid id.
     [[nodiscard]] const char* GetName() const;
-    [[nodiscard]] bool IsValid() const { return mInfo != nullptr; }
-    [[nodiscard]] FbxClassId GetParent() const;
+    [[nodiscard]] bool IsValid() const { return mInfo != nullptr; } ///< Whether it is the id of a class.
+    [[nodiscard]] FbxClassId GetParent() const; ///< The class it derives from; invalid for FbxObject.
 
+    /// Whether both are the same class.
     bool operator==(const FbxClassId& pOther) const { return mInfo == pOther.mInfo; }
-    bool operator!=(const FbxClassId& pOther) const { return mInfo != pOther.mInfo; }
+    bool operator!=(const FbxClassId& pOther) const { return mInfo != pOther.mInfo; } ///< The opposite.
 
-    [[nodiscard]] const detail::ClassInfo* info() const { return mInfo; }
+    [[nodiscard]] const detail::ClassInfo* info() const { return mInfo; } ///< The platform's own view of the class.
 
 private:
     const detail::ClassInfo* mInfo = nullptr;

@@ -24,11 +24,11 @@ public:
 
     FbxCriteria() = default; ///< meets every object
 
-    FbxCriteria operator&&(const FbxCriteria& pOther) const;
-    FbxCriteria operator||(const FbxCriteria& pOther) const;
-    FbxCriteria operator!() const;
+    FbxCriteria operator&&(const FbxCriteria& pOther) const; ///< What meets both.
+    FbxCriteria operator||(const FbxCriteria& pOther) const; ///< What meets one of the two, or both.
+    FbxCriteria operator!() const;                           ///< What does not meet this one.
 
-    [[nodiscard]] bool isMetBy(const FbxClassId& pClassId) const;
+    [[nodiscard]] bool isMetBy(const FbxClassId& pClassId) const; ///< Whether objects of exactly that class meet it.
     /// Made with &&, || or !.
     [[nodiscard]] bool isCombined() const { return mOperands != nullptr; }
     /// Whether both are the same without looking into what they are combined of.

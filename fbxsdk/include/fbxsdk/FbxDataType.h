@@ -20,30 +20,72 @@ struct PropertyTypeInfo {
 
 } // namespace detail
 
+/// The type of a property: what it holds and how files spell it. Cheap to copy; compares by identity, so that two types
+/// that hold the same may differ in their spelling.
 class FBXSDK_DLL FbxDataType {
 public:
-    constexpr FbxDataType() = default;
-    explicit constexpr FbxDataType(const detail::PropertyTypeInfo* pInfo) : mInfo(pInfo) {}
+    constexpr FbxDataType() = default;                                                      ///< The undefined type.
+    explicit constexpr FbxDataType(const detail::PropertyTypeInfo* pInfo) : mInfo(pInfo) {} ///< The platform's own.
 
-    [[nodiscard]] bool Valid() const { return mInfo != nullptr; }
+    [[nodiscard]] bool Valid() const { return mInfo != nullptr; } ///< False for the undefined type alone.
+    /// What values it holds; eFbxUndefined also for compounds.
     [[nodiscard]] EFbxType GetType() const { return mInfo ? mInfo->type : eFbxUndefined; }
+    /// For people, not unique; empty for the undefined type.
     [[nodiscard]] const char* GetName() const { return mInfo ? mInfo->apiName : ""; }
-    [[nodiscard]] bool Is(const FbxDataType& pOther) const { return mInfo == pOther.mInfo; }
+    [[nodiscard]] bool Is(const FbxDataType& pOther) const { return mInfo == pOther.mInfo; } ///< The same as ==.
+    /// Whether both are the same type.
     bool operator==(const FbxDataType& pOther) const { return mInfo == pOther.mInfo; }
-    bool operator!=(const FbxDataType& pOther) const { return mInfo != pOther.mInfo; }
+    bool operator!=(const FbxDataType& pOther) const { return mInfo != pOther.mInfo; } ///< The opposite.
 
+    /// The platform's own view of the type.
     [[nodiscard]] const detail::PropertyTypeInfo* info() const { return mInfo; }
 
 private:
     const detail::PropertyTypeInfo* mInfo = nullptr;
 };
 
-extern FBXSDK_DLL const FbxDataType FbxUndefinedDT, FbxBoolDT, FbxIntDT, FbxLongLongDT, FbxULongLongDT, FbxFloatDT,
-    FbxDoubleDT, FbxDouble2DT, FbxDouble3DT, FbxDouble4DT, FbxEnumDT, FbxStringDT, FbxTimeDT, FbxReferenceDT, FbxBlobDT,
-    FbxDistanceDT, FbxDateTimeDT, FbxColor3DT, FbxColor4DT, FbxCompoundDT, FbxUrlDT, FbxXRefUrlDT, FbxTranslationDT,
-    FbxRotationDT, FbxScalingDT, FbxQuaternionDT, FbxLocalTranslationDT, FbxLocalRotationDT, FbxLocalScalingDT,
-    FbxVisibilityDT, FbxVisibilityInheritanceDT, FbxRollDT, FbxFieldOfViewDT, FbxFieldOfViewXDT, FbxFieldOfViewYDT,
-    FbxOpticalCenterXDT, FbxOpticalCenterYDT, FbxNumberDT, FbxVectorDT, FbxAnimatedColorDT, FbxWeightDT, FbxShortDT,
-    FbxUByteDT;
+extern FBXSDK_DLL const FbxDataType FbxUndefinedDT, ///< no type
+    FbxBoolDT,                                      ///< FbxBool
+    FbxIntDT,                                       ///< FbxInt
+    FbxLongLongDT,                                  ///< FbxLongLong
+    FbxULongLongDT,                                 ///< FbxULongLong
+    FbxFloatDT,                                     ///< FbxFloat
+    FbxDoubleDT,                                    ///< FbxDouble, not meant to be animated
+    FbxDouble2DT,                                   ///< FbxDouble2
+    FbxDouble3DT,                                   ///< FbxDouble3, not meant to be animated
+    FbxDouble4DT,                                   ///< FbxDouble4
+    FbxEnumDT,                                      ///< FbxEnum
+    FbxStringDT,                                    ///< FbxString
+    FbxTimeDT,                                      ///< FbxTime
+    FbxReferenceDT,                                 ///< an object, held by a connection
+    FbxBlobDT,                                      ///< bytes
+    FbxDistanceDT,                                  ///< a length with a unit of its own
+    FbxDateTimeDT,                                  ///< a date, as text
+    FbxColor3DT,                                    ///< FbxDouble3, 0 to 1, not meant to be animated
+    FbxColor4DT,                                    ///< FbxDouble4, 0 to 1
+    FbxCompoundDT,                                  ///< holds other properties
+    FbxUrlDT,                                       ///< FbxString, the name of a file
+    FbxXRefUrlDT,                                   ///< FbxString, the name of a file that the scene needs
+    FbxTranslationDT,                               ///< FbxDouble3, scene units
+    FbxRotationDT,                                  ///< FbxDouble3, degrees
+    FbxScalingDT,                                   ///< FbxDouble3, factors
+    FbxQuaternionDT,                                ///< FbxDouble4
+    FbxLocalTranslationDT,                          ///< FbxDouble3, of FbxNode::LclTranslation
+    FbxLocalRotationDT,                             ///< FbxDouble3, of FbxNode::LclRotation
+    FbxLocalScalingDT,                              ///< FbxDouble3, of FbxNode::LclScaling
+    FbxVisibilityDT,                                ///< FbxDouble, of FbxNode::Visibility
+    FbxVisibilityInheritanceDT,                     ///< FbxBool, whether a node hides with its parent
+    FbxRollDT,                                      ///< FbxDouble, degrees, of FbxCamera::Roll
+    FbxFieldOfViewDT,                               ///< FbxDouble, degrees, of FbxCamera::FieldOfView
+    FbxFieldOfViewXDT,                              ///< FbxDouble, degrees, of FbxCamera::FieldOfViewX
+    FbxFieldOfViewYDT,                              ///< FbxDouble, degrees, of FbxCamera::FieldOfViewY
+    FbxOpticalCenterXDT,                            ///< FbxDouble, of FbxCamera::OpticalCenterX
+    FbxOpticalCenterYDT,                            ///< FbxDouble, of FbxCamera::OpticalCenterY
+    FbxNumberDT,                                    ///< FbxDouble, meant to be animated
+    FbxVectorDT,                                    ///< FbxDouble3, meant to be animated
+    FbxAnimatedColorDT,                             ///< FbxDouble3, 0 to 1, meant to be animated
+    FbxWeightDT,                                    ///< FbxDouble, percent
+    FbxShortDT,                                     ///< FbxShort
+    FbxUByteDT;                                     ///< FbxUChar
 
 FBXSDK_NAMESPACE_END

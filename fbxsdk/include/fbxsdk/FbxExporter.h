@@ -24,13 +24,16 @@ public:
     /// name; GetStatus then says why. A version that was set before stays.
     bool Initialize(const char* pFileName, int pFileFormat = -1, FbxIOSettings* pIOSettings = nullptr) override;
 
-    /// Writes the document, which must be a scene, with everything that is its member except the root node. The file
-    /// gets its name when all of it is written: until then, and after a failure, an older file of the name stays as it
-    /// was. Point caches that were written for the scene get their names in the same step.
+    /// Writes the document, which must be a scene, with all of its members but the root node. Left out are curves
+    /// without keys, curve nodes that say nothing beyond the static value, and, from 7.0 on, the producer cameras,
+    /// which such files have no place for.
     ///
-    /// False, with a status, before Initialize, for a document that is no scene, when the disk or the memory does not
-    /// suffice, and when the scene cannot be put into the format. Large meshes are compressed on all cores; the threads
-    /// end before the call returns.
+    /// The file gets its name when all of it is written: until then, and after a failure, an older file of the name
+    /// stays as it was. Point caches that wait for their scene (FbxCache::CloseFile) get their names in the same step.
+    /// Large meshes are compressed on all cores; the threads end before the call returns.
+    ///
+    /// False, with a status, before Initialize, for a document that is no scene, when disk or memory do not suffice,
+    /// and when the format cannot hold the scene.
     bool Export(FbxDocument* pDocument, bool pNonBlocking = false);
 
     /// One of the strings of GetCurrentWritableVersions; false for any other, and the version stays as it was. Without

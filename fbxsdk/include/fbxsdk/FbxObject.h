@@ -113,7 +113,7 @@ public:
         return GetClassId().Is(T::ClassId);
     }
 
-    /// UTF-8, never null; without the class prefix that files have, with the prefix of a name space. Not unique within
+    /// UTF-8, never null; without the class prefix that files have, with the prefix of a namespace. Not unique within
     /// a scene. Valid until the name changes or the object is destroyed.
     [[nodiscard]] const char* GetName() const;
     void SetName(const char* pName); ///< Copies the name; null is the empty name.

@@ -9,15 +9,23 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
+/// What a file says of one of its animation stacks, before anything is imported. Changing it has no effect on Import.
 class FBXSDK_DLL FbxTakeInfo {
 public:
-    enum EImportOffsetType { eAbsolute, eRelative };
+    /// How mImportOffset is meant; of no effect here.
+    enum EImportOffsetType {
+        eAbsolute, ///< the stack begins there
+        eRelative  ///< the stack is moved by it
+    };
 
-    FbxString mName, mImportName, mDescription;
-    bool mSelect = true;
-    FbxTimeSpan mLocalTimeSpan, mReferenceTimeSpan;
-    FbxTime mImportOffset;
-    EImportOffsetType mImportOffsetType = eAbsolute;
+    FbxString mName,                                 ///< of the stack, UTF-8
+        mImportName,                                 ///< the same name
+        mDescription;                                ///< of files from 7.0 on; mostly empty
+    bool mSelect = true;                             ///< true for every stack: all are imported
+    FbxTimeSpan mLocalTimeSpan,                      ///< as the file states it; from zero to zero when it does not
+        mReferenceTimeSpan;                          ///< as the file states it; from zero to zero when it does not
+    FbxTime mImportOffset;                           ///< zero; of no effect here
+    EImportOffsetType mImportOffsetType = eAbsolute; ///< of no effect here
 };
 
 FBXSDK_NAMESPACE_END

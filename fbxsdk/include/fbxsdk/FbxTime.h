@@ -8,126 +8,138 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-inline constexpr FbxLongLong FBXSDK_TC_ZERO = 0;
-inline constexpr FbxLongLong FBXSDK_TC_EPSILON = 1;
-inline constexpr FbxLongLong FBXSDK_TC_MILLISECOND = 46186158;
-inline constexpr FbxLongLong FBXSDK_TC_SECOND = FBXSDK_TC_MILLISECOND * 1000;
-inline constexpr FbxLongLong FBXSDK_TC_MINUTE = FBXSDK_TC_SECOND * 60;
-inline constexpr FbxLongLong FBXSDK_TC_HOUR = FBXSDK_TC_MINUTE * 60;
-inline constexpr FbxLongLong FBXSDK_TC_DAY = FBXSDK_TC_HOUR * 24;
-inline constexpr FbxLongLong FBXSDK_TC_INFINITY = INT64_MAX;
-inline constexpr FbxLongLong FBXSDK_TC_MINFINITY = -INT64_MAX;
+inline constexpr FbxLongLong FBXSDK_TC_ZERO = 0;                              ///< No ticks.
+inline constexpr FbxLongLong FBXSDK_TC_EPSILON = 1;                           ///< One tick, the smallest step of time.
+inline constexpr FbxLongLong FBXSDK_TC_MILLISECOND = 46186158;                ///< Ticks per millisecond.
+inline constexpr FbxLongLong FBXSDK_TC_SECOND = FBXSDK_TC_MILLISECOND * 1000; ///< Ticks per second.
+inline constexpr FbxLongLong FBXSDK_TC_MINUTE = FBXSDK_TC_SECOND * 60;        ///< Ticks per minute.
+inline constexpr FbxLongLong FBXSDK_TC_HOUR = FBXSDK_TC_MINUTE * 60;          ///< Ticks per hour.
+inline constexpr FbxLongLong FBXSDK_TC_DAY = FBXSDK_TC_HOUR * 24;             ///< Ticks per day.
+inline constexpr FbxLongLong FBXSDK_TC_INFINITY = INT64_MAX;                  ///< No end; the largest number of ticks.
+inline constexpr FbxLongLong FBXSDK_TC_MINFINITY = -INT64_MAX;                ///< No beginning; its negative.
 
 /// A time as a whole number of ticks, 46186158000 to the second.
 ///
 /// Arithmetic never overflows: what is too far becomes FBXSDK_TC_INFINITY or FBXSDK_TC_MINFINITY.
 class FBXSDK_DLL FbxTime {
 public:
-    /// Files may hold any number; one that is no mode counts as eDefaultMode.
+    /// How frames count. Files may hold any number; one that is no mode counts as eDefaultMode.
     enum EMode : int {
         eDefaultMode = 0, ///< the global time mode of the calling thread
-        eFrames120,
-        eFrames100,
-        eFrames60,
-        eFrames50,
-        eFrames48,
-        eFrames30,
-        eFrames30Drop,
-        eNTSCDropFrame,
-        eNTSCFullFrame,
-        ePAL,
-        eFrames24,
-        eFrames1000,
-        eFilmFullFrame,
-        eCustom, ///< the rate given to SetGlobalTimeMode
-        eFrames96,
-        eFrames72,
-        eFrames59dot94,
-        eFrames119dot88,
-        eModesCount
+        eFrames120,       ///< 120 frames per second
+        eFrames100,       ///< 100 frames per second
+        eFrames60,        ///< 60 frames per second
+        eFrames50,        ///< 50 frames per second
+        eFrames48,        ///< 48 frames per second
+        eFrames30,        ///< 30 frames per second
+        eFrames30Drop,    ///< 30 frames per second, shown as a time code that leaves numbers out
+        eNTSCDropFrame,   ///< 29.97002617 frames per second, shown as a time code that leaves numbers out
+        eNTSCFullFrame,   ///< 29.97002617 frames per second
+        ePAL,             ///< 25 frames per second
+        eFrames24,        ///< 24 frames per second
+        eFrames1000,      ///< 1000 frames per second
+        eFilmFullFrame,   ///< 23.976 frames per second
+        eCustom,          ///< the rate given to SetGlobalTimeMode
+        eFrames96,        ///< 96 frames per second
+        eFrames72,        ///< 72 frames per second
+        eFrames59dot94,   ///< 59.94005234 frames per second
+        eFrames119dot88,  ///< 119.88010468 frames per second
+        eModesCount       ///< how many modes there are; none itself
     };
-    enum EProtocol { eSMPTE, eFrameCount, eDefaultProtocol };
+    /// How applications show times.
+    enum EProtocol {
+        eSMPTE,          ///< hours, minutes, seconds, frames
+        eFrameCount,     ///< the number of the frame
+        eDefaultProtocol ///< as the application does otherwise
+    };
 
+    /// That many ticks; not explicit, so that ticks pass for times.
     constexpr FbxTime(const FbxLongLong pTime = 0) : mTime(pTime) {}
 
-    void Set(FbxLongLong pTime) { mTime = pTime; }
-    [[nodiscard]] constexpr FbxLongLong Get() const { return mTime; }
+    void Set(FbxLongLong pTime) { mTime = pTime; }                    ///< Sets the number of ticks.
+    [[nodiscard]] constexpr FbxLongLong Get() const { return mTime; } ///< The number of ticks.
 
-    void SetMilliSeconds(FbxLongLong pMilliSeconds);
+    void SetMilliSeconds(FbxLongLong pMilliSeconds);   ///< Infinite when there are too many.
     [[nodiscard]] FbxLongLong GetMilliSeconds() const; ///< Whole milliseconds, truncated toward zero.
 
     /// Rounds to the nearest tick, so that frame ÷ rate lands exactly on the frame. NaN gives zero; what is too far
     /// becomes infinite.
     void SetSecondDouble(double pTime);
-    [[nodiscard]] double GetSecondDouble() const;
+    [[nodiscard]] double GetSecondDouble() const; ///< The nearest double to ticks ÷ 46186158000.
 
     /// Hours, minutes and seconds of real time (not of a time code) plus frames and half frames (fields) of the mode.
     void SetTime(int pHour, int pMinute, int pSecond, int pFrame = 0, int pField = 0, EMode pTimeMode = eDefaultMode);
 
+    /// The time at which a frame begins, rounded to the nearest tick where the mode's frames are not whole numbers of
+    /// them.
     void SetFrame(FbxLongLong pFrames, EMode pTimeMode = eDefaultMode);
     /// Whole frames, truncated toward zero; a time within a hundredth of a frame of a whole frame counts as that frame.
     [[nodiscard]] FbxLongLong GetFrameCount(EMode pTimeMode = eDefaultMode) const;
-    [[nodiscard]] double GetFrameCountPrecise(EMode pTimeMode = eDefaultMode) const;
+    [[nodiscard]] double GetFrameCountPrecise(EMode pTimeMode = eDefaultMode) const; ///< Frames with their fraction.
 
-    /// Frames per second, always greater than zero.
+    /// Frames per second, always greater than zero: 30 where neither the mode nor the thread's global mode states a
+    /// rate.
     [[nodiscard]] static double GetFrameRate(EMode pTimeMode);
     /// Ticks per frame, rounded to the nearest.
     [[nodiscard]] static FbxLongLong GetOneFrameValue(EMode pTimeMode = eDefaultMode);
     /// The first mode whose rate is no further than the precision away; eDefaultMode when there is none.
     [[nodiscard]] static EMode ConvertFrameRateToTimeMode(double pFrameRate, double pPrecision = 0.00000001);
 
-    /// What eDefaultMode and eCustom mean on the calling thread. The rate is used with eCustom only; one that is not
-    /// greater than zero stands for 30.
+    /// What eDefaultMode and eCustom mean on the calling thread; other threads keep theirs. The rate is used with
+    /// eCustom only; one that is not greater than zero stands for 30.
     static void SetGlobalTimeMode(EMode pTimeMode, double pFrameRate = 0.0);
-    [[nodiscard]] static EMode GetGlobalTimeMode();
+    [[nodiscard]] static EMode GetGlobalTimeMode(); ///< Of the calling thread; eFrames30 at first.
 
+    /// Exact, in ticks, as all comparisons are.
     constexpr bool operator==(const FbxTime& pTime) const { return mTime == pTime.mTime; }
-    constexpr bool operator!=(const FbxTime& pTime) const { return mTime != pTime.mTime; }
-    constexpr bool operator<(const FbxTime& pTime) const { return mTime < pTime.mTime; }
-    constexpr bool operator<=(const FbxTime& pTime) const { return mTime <= pTime.mTime; }
-    constexpr bool operator>(const FbxTime& pTime) const { return mTime > pTime.mTime; }
-    constexpr bool operator>=(const FbxTime& pTime) const { return mTime >= pTime.mTime; }
+    constexpr bool operator!=(const FbxTime& pTime) const { return mTime != pTime.mTime; } ///< Exact.
+    constexpr bool operator<(const FbxTime& pTime) const { return mTime < pTime.mTime; }   ///< Earlier.
+    constexpr bool operator<=(const FbxTime& pTime) const { return mTime <= pTime.mTime; } ///< Not later.
+    constexpr bool operator>(const FbxTime& pTime) const { return mTime > pTime.mTime; }   ///< Later.
+    constexpr bool operator>=(const FbxTime& pTime) const { return mTime >= pTime.mTime; } ///< Not earlier.
 
-    FbxTime& operator+=(const FbxTime& pTime);
-    FbxTime& operator-=(const FbxTime& pTime);
-    FbxTime operator+(const FbxTime& pTime) const;
-    FbxTime operator-(const FbxTime& pTime) const;
+    FbxTime& operator+=(const FbxTime& pTime);     ///< Infinite when the sum is too far.
+    FbxTime& operator-=(const FbxTime& pTime);     ///< Infinite when the difference is too far.
+    FbxTime operator+(const FbxTime& pTime) const; ///< Infinite when the sum is too far.
+    FbxTime operator-(const FbxTime& pTime) const; ///< Infinite when the difference is too far.
     FbxTime operator*(const FbxTime& pTime) const; ///< The product of the tick counts.
     FbxTime operator/(const FbxTime& pTime) const; ///< The quotient of the tick counts; division by zero saturates.
-    FbxTime operator*(int pFactor) const;
-    FbxTime operator/(int pDivisor) const;
+    FbxTime operator*(int pFactor) const;          ///< That many times as long.
+    FbxTime operator/(int pDivisor) const; ///< That part of it, truncated toward zero; division by zero saturates.
 
-    FbxTime& operator++(); ///< One tick on.
-    FbxTime operator++(int);
-    FbxTime& operator--();
-    FbxTime operator--(int);
+    FbxTime& operator++();   ///< One tick on.
+    FbxTime operator++(int); ///< One tick on; the result is the time before.
+    FbxTime& operator--();   ///< One tick back.
+    FbxTime operator--(int); ///< One tick back; the result is the time before.
 
 private:
     FbxLongLong mTime;
 };
 
-inline constexpr FbxTime FBXSDK_TIME_ZERO{FBXSDK_TC_ZERO};
-inline constexpr FbxTime FBXSDK_TIME_EPSILON{FBXSDK_TC_EPSILON};
-inline constexpr FbxTime FBXSDK_TIME_ONE_SECOND{FBXSDK_TC_SECOND};
-inline constexpr FbxTime FBXSDK_TIME_ONE_MINUTE{FBXSDK_TC_MINUTE};
-inline constexpr FbxTime FBXSDK_TIME_ONE_HOUR{FBXSDK_TC_HOUR};
+inline constexpr FbxTime FBXSDK_TIME_ZERO{FBXSDK_TC_ZERO};         ///< No time at all.
+inline constexpr FbxTime FBXSDK_TIME_EPSILON{FBXSDK_TC_EPSILON};   ///< One tick.
+inline constexpr FbxTime FBXSDK_TIME_ONE_SECOND{FBXSDK_TC_SECOND}; ///< 46186158000 ticks.
+inline constexpr FbxTime FBXSDK_TIME_ONE_MINUTE{FBXSDK_TC_MINUTE}; ///< 60 seconds.
+inline constexpr FbxTime FBXSDK_TIME_ONE_HOUR{FBXSDK_TC_HOUR};     ///< 60 minutes.
+/// No end; as a time of evaluation: the static value.
 inline constexpr FbxTime FBXSDK_TIME_INFINITE{FBXSDK_TC_INFINITY};
-inline constexpr FbxTime FBXSDK_TIME_MINUS_INFINITE{FBXSDK_TC_MINFINITY};
+inline constexpr FbxTime FBXSDK_TIME_MINUS_INFINITE{FBXSDK_TC_MINFINITY}; ///< No beginning.
 
-inline constexpr int FBXSDK_TIME_FORWARD = 1;
-inline constexpr int FBXSDK_TIME_BACKWARD = 0;
+inline constexpr int FBXSDK_TIME_FORWARD = 1;  ///< A span whose stop is not before its start.
+inline constexpr int FBXSDK_TIME_BACKWARD = 0; ///< A span whose stop is before its start.
 
 /// A pair of times; the start may lie behind the stop.
 class FBXSDK_DLL FbxTimeSpan {
 public:
-    constexpr FbxTimeSpan() = default;
-    constexpr FbxTimeSpan(FbxTime pStart, FbxTime pStop) : mStart(pStart), mStop(pStop) {}
+    constexpr FbxTimeSpan() = default;                                                     ///< From zero to zero.
+    constexpr FbxTimeSpan(FbxTime pStart, FbxTime pStop) : mStart(pStart), mStop(pStop) {} ///< As given, in any order.
 
-    void Set(FbxTime pStart, FbxTime pStop) { *this = FbxTimeSpan(pStart, pStop); }
-    void SetStart(FbxTime pStart) { mStart = pStart; }
-    void SetStop(FbxTime pStop) { mStop = pStop; }
+    void Set(FbxTime pStart, FbxTime pStop) { *this = FbxTimeSpan(pStart, pStop); } ///< As given, in any order.
+    void SetStart(FbxTime pStart) { mStart = pStart; }                              ///< The stop stays.
+    void SetStop(FbxTime pStop) { mStop = pStop; }                                  ///< The start stays.
+    /// The first of the pair, not always the earlier.
     [[nodiscard]] constexpr FbxTime GetStart() const { return mStart; }
-    [[nodiscard]] constexpr FbxTime GetStop() const { return mStop; }
+    [[nodiscard]] constexpr FbxTime GetStop() const { return mStop; } ///< The second of the pair.
 
     /// The distance of start and stop, never negative.
     [[nodiscard]] FbxTime GetDuration() const;
@@ -142,10 +154,11 @@ public:
     /// Widens this span so that it covers the other one, in the given direction.
     void UnionAssignment(const FbxTimeSpan& pOther, int pDirection = FBXSDK_TIME_FORWARD);
 
+    /// Same start and same stop: a span and its reverse differ.
     constexpr bool operator==(const FbxTimeSpan& pOther) const {
         return mStart == pOther.mStart && mStop == pOther.mStop;
     }
-    constexpr bool operator!=(const FbxTimeSpan& pOther) const { return !(*this == pOther); }
+    constexpr bool operator!=(const FbxTimeSpan& pOther) const { return !(*this == pOther); } ///< The opposite.
 
 private:
     FbxTime mStart;

@@ -8,6 +8,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
+/// How a node's transform takes over its parent's.
 class FBXSDK_DLL FbxTransform {
 public:
     /// Where the parent's scaling (S) enters among the child's rotation (r) and scaling (s).
