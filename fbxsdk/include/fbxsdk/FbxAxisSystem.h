@@ -11,42 +11,83 @@ FBXSDK_NAMESPACE_BEGIN
 class FbxNode;
 class FbxScene;
 
+/// Which axis is up, which is front, and of which hand the system is; and the conversion of scenes between systems.
 class FBXSDK_DLL FbxAxisSystem {
 public:
-    enum EUpVector : int { eXAxis = 1, eYAxis = 2, eZAxis = 3 };
+    /// The axis that points up; negative for down.
+    enum EUpVector : int {
+        eXAxis = 1, ///< X
+        eYAxis = 2, ///< Y
+        eZAxis = 3  ///< Z
+    };
     /// Of the two axes beside the up axis, in the order X, Y, Z: the first is even, the second odd. The front points at
-    /// the viewer. Both enumerations are negative for the opposite direction.
-    enum EFrontVector : int { eParityEven = 1, eParityOdd = 2 };
-    enum ECoordSystem : int { eRightHanded, eLeftHanded };
-    enum EPreDefinedAxisSystem { eMayaZUp, eMayaYUp, eMax, eMotionBuilder, eOpenGL, eDirectX, eLightwave };
+    /// the viewer. Negative for the opposite direction.
+    enum EFrontVector : int {
+        eParityEven = 1, ///< the first of the two
+        eParityOdd = 2   ///< the second of the two
+    };
+    /// Of which hand the system is.
+    enum ECoordSystem : int {
+        eRightHanded, ///< up × front is the third axis
+        eLeftHanded   ///< up × front is its opposite
+    };
+    /// The systems of well-known programs.
+    enum EPreDefinedAxisSystem {
+        eMayaZUp,       ///< Z up, -Y front, right-handed
+        eMayaYUp,       ///< Y up, Z front, right-handed
+        eMax,           ///< as eMayaZUp
+        eMotionBuilder, ///< as eMayaYUp
+        eOpenGL,        ///< as eMayaYUp
+        eDirectX,       ///< Y up, Z front, left-handed
+        eLightwave      ///< as eDirectX
+    };
 
     constexpr FbxAxisSystem() = default; ///< Y up, odd, right-handed
     /// What is no axis or no parity gives the default system.
     FbxAxisSystem(EUpVector pUpVector, EFrontVector pFrontVector, ECoordSystem pCoorSystem);
+    /// The system of that program.
     FbxAxisSystem(EPreDefinedAxisSystem pAxisSystem);
 
-    bool operator==(const FbxAxisSystem& pOther) const;
-    bool operator!=(const FbxAxisSystem& pOther) const { return !(*this == pOther); }
+    bool operator==(const FbxAxisSystem& pOther) const; ///< Same axes, same signs and same hand.
+    bool operator!=(const FbxAxisSystem& pOther) const { return !(*this == pOther); } ///< The opposite.
 
-    /// Turns the nodes below the root, so that every global matrix is the old one seen from the new system. Rotation
-    /// curves and mesh points stay. A change of handedness alone changes nothing.
+    /// Turns the nodes below the root, so that every global matrix is the old one seen from the new system, and with
+    /// them cameras and bind matrices. Rotation curves and mesh points stay. A change of handedness alone turns
+    /// nothing. The scene's global settings state this system afterwards; a scene that has it already, and null, are
+    /// left alone.
     void ConvertScene(FbxScene* pScene) const;
+    /// The same for the children of that node in place of the root's.
     void ConvertScene(FbxScene* pScene, FbxNode* pFbxRoot) const;
+    /// Turns the children of the node alone: cameras, bind matrices and global settings stay.
     void ConvertChildren(FbxNode* pRoot, const FbxAxisSystem& pSrcSystem) const;
 
+    /// The axis without its sign, which becomes pSign: 1 or -1.
     [[nodiscard]] EUpVector GetUpVector(int& pSign) const;
+    /// The parity without its sign, which becomes pSign: 1 or -1.
     [[nodiscard]] EFrontVector GetFrontVector(int& pSign) const;
-    [[nodiscard]] ECoordSystem GetCoorSystem() const { return mCoorSystem; }
+    [[nodiscard]] ECoordSystem GetCoorSystem() const { return mCoorSystem; } ///< Of which hand it is.
 
-    static const FbxAxisSystem MayaZUp, MayaYUp, Max, Motionbuilder, OpenGL, DirectX, Lightwave;
+    static const FbxAxisSystem MayaZUp, ///< Z up, -Y front, right-handed
+        MayaYUp,                        ///< Y up, Z front, right-handed
+        Max,                            ///< Z up, -Y front, right-handed
+        Motionbuilder,                  ///< Y up, Z front, right-handed
+        OpenGL,                         ///< Y up, Z front, right-handed
+        DirectX,                        ///< Y up, Z front, left-handed
+        Lightwave;                      ///< Y up, Z front, left-handed
 
     /// The system of three axes as files state them: 0 X, 1 Y, 2 Z, each with a sign. Axes that do not make a system
     /// give the default one.
     static FbxAxisSystem fromAxes(int pUp, int pUpSign, int pFront, int pFrontSign, int pCoord, int pCoordSign);
+    /// The three axes as files state them.
     struct Axes {
-        int up, upSign, front, frontSign, coord, coordSign;
+        int up,        ///< 0 X, 1 Y, 2 Z
+            upSign,    ///< 1 or -1
+            front,     ///< 0 X, 1 Y, 2 Z
+            frontSign, ///< 1 or -1
+            coord,     ///< the third axis
+            coordSign; ///< 1 or -1
     };
-    [[nodiscard]] Axes axes() const;
+    [[nodiscard]] Axes axes() const; ///< What fromAxes makes this system of.
 
 private:
     int mUp = eYAxis;

@@ -16,35 +16,55 @@ class FbxNode;
 class FbxObject;
 class FbxScene;
 
+/// The default camera, the seven producer cameras (an application's own views: perspective, top, bottom, front, back,
+/// right, left) and the camera switcher. They are members of the scene and not below its root.
 class FBXSDK_DLL FbxGlobalCameraSettings {
 public:
-    enum EViewingMode { eStandard, eXRay, eModelsOnly };
+    /// How an application draws; no call here uses it.
+    enum EViewingMode {
+        eStandard,  ///< everything
+        eXRay,      ///< what is hidden shines through
+        eModelsOnly ///< models without lights, cameras and bones
+    };
 
+    /// For the scene, which has one of its own.
     explicit FbxGlobalCameraSettings(FbxScene& pScene) : mScene(&pScene) {}
 
-    /// True for one of the eight fixed names and for the name of a camera below the root; it is then the default camera
-    /// of the global settings, where 7.x files keep it.
+    /// True for one of the eight fixed names ("Producer Perspective" and so on, "Camera Switcher") and for the name of
+    /// a camera below the root; it is then the default camera of the global settings, where 7.x files keep it. False,
+    /// with a status, for any other.
     bool SetDefaultCamera(const char* pCameraName, FbxStatus* pStatus = nullptr);
-    /// "Producer Perspective" where the global settings name none. Valid until the name changes.
+    /// "Producer Perspective" where the global settings name none. Never null; valid until the name changes.
     [[nodiscard]] const char* GetDefaultCamera() const;
 
     /// Makes those of the seven cameras, and the switcher, that are not there. Each stands on a node of its own, which
-    /// belongs to the scene but hangs nowhere.
+    /// belongs to the scene and has no parent.
     void CreateProducerCameras();
+    /// Destroys the seven cameras, the switcher and their nodes; pointers to them are invalid afterwards.
     void DestroyProducerCameras();
+    /// Whether it is one of the seven; false for null.
     [[nodiscard]] bool IsProducerCamera(const FbxCamera* pCamera) const;
+    /// Null until made, set or found in a file.
     [[nodiscard]] FbxCameraSwitcher* GetCameraSwitcher() const { return mSwitcher; }
-    /// It joins the scene; one of another scene changes nothing.
+    /// It joins the scene; one of another scene changes nothing. Null forgets the switcher, which lives on.
     void SetCameraSwitcher(FbxCameraSwitcher* pCameraSwitcher);
 
-    // Null until made or found in a file.
+    /// Null until made or found in a file, as the following ones. Perspective, from in front and above.
     [[nodiscard]] FbxCamera* GetCameraProducerPerspective() const { return mCameras[0]; }
+    /// Orthogonal, looking down; null until made.
     [[nodiscard]] FbxCamera* GetCameraProducerTop() const { return mCameras[1]; }
+    /// Orthogonal, looking up; null until made.
     [[nodiscard]] FbxCamera* GetCameraProducerBottom() const { return mCameras[2]; }
+    /// Orthogonal, from positive Z; null until made.
     [[nodiscard]] FbxCamera* GetCameraProducerFront() const { return mCameras[3]; }
+    /// Orthogonal, from negative Z; null until made.
     [[nodiscard]] FbxCamera* GetCameraProducerBack() const { return mCameras[4]; }
+    /// Orthogonal, from positive X; null until made.
     [[nodiscard]] FbxCamera* GetCameraProducerRight() const { return mCameras[5]; }
+    /// Orthogonal, from negative X; null until made.
     [[nodiscard]] FbxCamera* GetCameraProducerLeft() const { return mCameras[6]; }
+    /// Makes the cameras and the switcher anew and "Producer Perspective" the default camera; pointers to the former
+    /// ones are invalid.
     void RestoreDefaultSettings();
 
     /// Takes over a camera node of a file that bears the name of a producer camera or of the switcher. False for any

@@ -10,28 +10,35 @@ FBXSDK_NAMESPACE_BEGIN
 
 class FbxScene;
 
+/// Ambient light and fog. Files before 7.0 hold both; later ones hold the ambient colour alone, so that the fog is lost
+/// with them.
 class FBXSDK_DLL FbxGlobalLightSettings {
 public:
-    enum EFogMode { eLinear, eExponential, eExponentialSquareRoot };
+    /// How the fog thickens with the distance.
+    enum EFogMode {
+        eLinear,               ///< evenly, from start to end
+        eExponential,          ///< exponentially, by the density
+        eExponentialSquareRoot ///< exponentially with the square of the distance, by the density
+    };
 
-    explicit FbxGlobalLightSettings(FbxScene& pScene) : mScene(&pScene) {}
+    explicit FbxGlobalLightSettings(FbxScene& pScene) : mScene(&pScene) {} ///< For the scene, which has one of its own.
 
     /// The ambient colour of the global settings, where 7.x files keep it, and an alpha beside it.
     void SetAmbientColor(FbxColor pAmbientColor);
-    [[nodiscard]] FbxColor GetAmbientColor() const;
-    void SetFogEnable(bool pEnable) { mFogEnable = pEnable; }
-    [[nodiscard]] bool GetFogEnable() const { return mFogEnable; }
-    void SetFogColor(FbxColor pColor) { mFogColor = pColor; }
-    [[nodiscard]] FbxColor GetFogColor() const { return mFogColor; }
-    void SetFogMode(EFogMode pMode) { mFogMode = pMode; }
-    [[nodiscard]] EFogMode GetFogMode() const { return mFogMode; }
-    void SetFogDensity(double pDensity) { mFogDensity = pDensity; }
-    [[nodiscard]] double GetFogDensity() const { return mFogDensity; }
-    void SetFogStart(double pStart) { mFogStart = pStart; }
-    [[nodiscard]] double GetFogStart() const { return mFogStart; }
-    void SetFogEnd(double pEnd) { mFogEnd = pEnd; }
-    [[nodiscard]] double GetFogEnd() const { return mFogEnd; }
-    void RestoreDefaultSettings();
+    [[nodiscard]] FbxColor GetAmbientColor() const;                    ///< Opaque black by default.
+    void SetFogEnable(bool pEnable) { mFogEnable = pEnable; }          ///< Whether there is fog.
+    [[nodiscard]] bool GetFogEnable() const { return mFogEnable; }     ///< False by default.
+    void SetFogColor(FbxColor pColor) { mFogColor = pColor; }          ///< 0 to 1; not checked.
+    [[nodiscard]] FbxColor GetFogColor() const { return mFogColor; }   ///< Opaque white by default.
+    void SetFogMode(EFogMode pMode) { mFogMode = pMode; }              ///< Which of the following numbers count.
+    [[nodiscard]] EFogMode GetFogMode() const { return mFogMode; }     ///< eLinear by default.
+    void SetFogDensity(double pDensity) { mFogDensity = pDensity; }    ///< Of both exponential modes.
+    [[nodiscard]] double GetFogDensity() const { return mFogDensity; } ///< 0.002 by default.
+    void SetFogStart(double pStart) { mFogStart = pStart; } ///< Distance at which linear fog begins, scene units.
+    [[nodiscard]] double GetFogStart() const { return mFogStart; } ///< 0.3 by default.
+    void SetFogEnd(double pEnd) { mFogEnd = pEnd; }            ///< Distance at which linear fog is full, scene units.
+    [[nodiscard]] double GetFogEnd() const { return mFogEnd; } ///< 1000 by default.
+    void RestoreDefaultSettings();                             ///< Black ambient light and no fog.
 
 private:
     FbxScene* mScene;

@@ -8,17 +8,19 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
+/// How names are changed on export. The platform leaves them as they are, whatever is asked for.
 class FBXSDK_DLL FbxSceneRenamer {
 public:
+    /// From which program's rules to which; all of them rename nothing here.
     enum ERenamingMode {
-        eNone,
-        eMAYA_TO_FBX5,
-        eMAYA_TO_FBX_MB75,
-        eMAYA_TO_FBX_MB70,
-        eFBXMB75_TO_FBXMB70,
-        eFBX_TO_FBX,
-        eMAYA_TO_FBX,
-        eFBX_TO_MAYA
+        eNone,               ///< as they are
+        eMAYA_TO_FBX5,       ///< Maya to FBX 5
+        eMAYA_TO_FBX_MB75,   ///< Maya to MotionBuilder 7.5
+        eMAYA_TO_FBX_MB70,   ///< Maya to MotionBuilder 7.0
+        eFBXMB75_TO_FBXMB70, ///< MotionBuilder 7.5 to 7.0
+        eFBX_TO_FBX,         ///< FBX to FBX
+        eMAYA_TO_FBX,        ///< Maya to FBX
+        eFBX_TO_MAYA         ///< FBX to Maya
     };
 };
 

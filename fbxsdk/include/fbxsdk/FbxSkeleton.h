@@ -8,19 +8,26 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
+/// A bone, as a kind of attribute: its place is the node, and what it moves is said by clusters (FbxCluster::GetLink).
 class FBXSDK_DLL FbxSkeleton : public FbxNodeAttribute {
     FBXSDK_OBJECT_DECLARE(FbxSkeleton, FbxNodeAttribute)
 
 public:
-    enum EType { eRoot, eLimb, eLimbNode, eEffector };
+    /// What part of a skeleton it is.
+    enum EType {
+        eRoot,     ///< the bone above all others
+        eLimb,     ///< a bone with a length
+        eLimbNode, ///< a joint, which nearly all files have; the default
+        eEffector  ///< the end of a chain
+    };
 
-    FbxPropertyT<FbxDouble> Size;
-    FbxPropertyT<FbxDouble> LimbLength;
+    FbxPropertyT<FbxDouble> Size;       ///< of the drawn joint, percent; 100
+    FbxPropertyT<FbxDouble> LimbLength; ///< of an eLimb, as a part of the distance to the next joint; 1
 
-    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eSkeleton.
 
-    void SetSkeletonType(EType pType) { mType = pType; }
-    [[nodiscard]] EType GetSkeletonType() const { return mType; }
+    void SetSkeletonType(EType pType) { mType = pType; }          ///< Any value is stored.
+    [[nodiscard]] EType GetSkeletonType() const { return mType; } ///< eLimbNode by default.
 
 private:
     EType mType = eLimbNode; ///< what nearly all files hold

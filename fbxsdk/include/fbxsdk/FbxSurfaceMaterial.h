@@ -8,45 +8,48 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A material of any shading model.
+/// A material of any shading model. Materials stand on nodes (FbxNode::AddMaterial); which polygon has which is said by
+/// layer elements.
 class FBXSDK_DLL FbxSurfaceMaterial : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxSurfaceMaterial, FbxObject)
 
 public:
-    FbxPropertyT<FbxString> ShadingModel;
-    FbxPropertyT<FbxBool> MultiLayer;
+    FbxPropertyT<FbxString> ShadingModel; ///< "Unknown", "Lambert" or "Phong" by class; any text
+    FbxPropertyT<FbxBool> MultiLayer;     ///< whether layers of textures count; false
 };
 
-/// Colours are 0 to 1, each with a factor of its own.
+/// A matt material. Colours are 0 to 1, each with a factor of its own; textures are sources of the properties.
 class FBXSDK_DLL FbxSurfaceLambert : public FbxSurfaceMaterial {
     FBXSDK_OBJECT_DECLARE(FbxSurfaceLambert, FbxSurfaceMaterial)
 
 public:
-    FbxPropertyT<FbxDouble3> Emissive; ///< in files EmissiveColor
-    FbxPropertyT<FbxDouble> EmissiveFactor;
-    FbxPropertyT<FbxDouble3> Ambient; ///< in files AmbientColor
-    FbxPropertyT<FbxDouble> AmbientFactor;
-    FbxPropertyT<FbxDouble3> Diffuse; ///< in files DiffuseColor
-    FbxPropertyT<FbxDouble> DiffuseFactor;
-    FbxPropertyT<FbxDouble3> NormalMap, Bump;
-    FbxPropertyT<FbxDouble> BumpFactor;
-    FbxPropertyT<FbxDouble3> TransparentColor;
-    FbxPropertyT<FbxDouble> TransparencyFactor;
-    FbxPropertyT<FbxDouble3> DisplacementColor;
-    FbxPropertyT<FbxDouble> DisplacementFactor;
-    FbxPropertyT<FbxDouble3> VectorDisplacementColor;
-    FbxPropertyT<FbxDouble> VectorDisplacementFactor;
+    FbxPropertyT<FbxDouble3> Emissive;                ///< in files EmissiveColor; black, animatable
+    FbxPropertyT<FbxDouble> EmissiveFactor;           ///< 1, animatable
+    FbxPropertyT<FbxDouble3> Ambient;                 ///< in files AmbientColor; (0.2, 0.2, 0.2), animatable
+    FbxPropertyT<FbxDouble> AmbientFactor;            ///< 1, animatable
+    FbxPropertyT<FbxDouble3> Diffuse;                 ///< in files DiffuseColor; (0.8, 0.8, 0.8), animatable
+    FbxPropertyT<FbxDouble> DiffuseFactor;            ///< 1, animatable
+    FbxPropertyT<FbxDouble3> NormalMap,               ///< for a texture of normals; (0, 0, 0)
+        Bump;                                         ///< for a texture of heights; (0, 0, 0)
+    FbxPropertyT<FbxDouble> BumpFactor;               ///< 1
+    FbxPropertyT<FbxDouble3> TransparentColor;        ///< what passes through; black, animatable
+    FbxPropertyT<FbxDouble> TransparencyFactor;       ///< 0 opaque (the default) to 1, animatable
+    FbxPropertyT<FbxDouble3> DisplacementColor;       ///< for a texture of displacements along the normal; black
+    FbxPropertyT<FbxDouble> DisplacementFactor;       ///< 1
+    FbxPropertyT<FbxDouble3> VectorDisplacementColor; ///< for a texture of displacements in all directions; black
+    FbxPropertyT<FbxDouble> VectorDisplacementFactor; ///< 1
 };
 
+/// A shining material: a matt one with highlights and reflections.
 class FBXSDK_DLL FbxSurfacePhong : public FbxSurfaceLambert {
     FBXSDK_OBJECT_DECLARE(FbxSurfacePhong, FbxSurfaceLambert)
 
 public:
-    FbxPropertyT<FbxDouble3> Specular; ///< in files SpecularColor
-    FbxPropertyT<FbxDouble> SpecularFactor;
-    FbxPropertyT<FbxDouble> Shininess;   ///< in files ShininessExponent
-    FbxPropertyT<FbxDouble3> Reflection; ///< in files ReflectionColor
-    FbxPropertyT<FbxDouble> ReflectionFactor;
+    FbxPropertyT<FbxDouble3> Specular;      ///< in files SpecularColor; (0.2, 0.2, 0.2), animatable
+    FbxPropertyT<FbxDouble> SpecularFactor; ///< 1, animatable
+    FbxPropertyT<FbxDouble> Shininess;   ///< in files ShininessExponent; the exponent of the highlight, 20, animatable
+    FbxPropertyT<FbxDouble3> Reflection; ///< in files ReflectionColor; black, animatable
+    FbxPropertyT<FbxDouble> ReflectionFactor; ///< 1, animatable
 };
 
 FBXSDK_NAMESPACE_END

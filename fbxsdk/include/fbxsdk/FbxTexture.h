@@ -10,75 +10,99 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// What all textures share: use, mapping and placement.
+/// What all textures share: use, mapping and placement. A texture is a source of the property that it colours.
 class FBXSDK_DLL FbxTexture : public FbxObject {
     FBXSDK_ABSTRACT_DECLARE(FbxTexture, FbxObject)
 
 public:
+    /// What the texture is for.
     enum ETextureUse {
-        eStandard,
-        eShadowMap,
-        eLightMap,
-        eSphericalReflectionMap,
-        eSphereReflectionMap,
-        eBumpNormalMap
+        eStandard,               ///< a colour; the default
+        eShadowMap,              ///< shadows
+        eLightMap,               ///< light
+        eSphericalReflectionMap, ///< a reflected surrounding, by angles
+        eSphereReflectionMap,    ///< a reflected surrounding, as on a ball
+        eBumpNormalMap           ///< the direction of normals
     };
-    enum EMappingType { eNull, ePlanar, eSpherical, eCylindrical, eBox, eFace, eUV, eEnvironment };
-    enum EWrapMode : int { eRepeat, eClamp };
+    /// How a surface gets its coordinates.
+    enum EMappingType {
+        eNull,        ///< not said
+        ePlanar,      ///< by a plane
+        eSpherical,   ///< by a ball
+        eCylindrical, ///< by a cylinder
+        eBox,         ///< by six planes
+        eFace,        ///< each face by itself
+        eUV,          ///< by the geometry's texture coordinates; the default
+        eEnvironment  ///< by reflection
+    };
+    /// What lies beyond the coordinates 0 and 1.
+    enum EWrapMode : int {
+        eRepeat, ///< the image over again; the default
+        eClamp   ///< the colour of its edge
+    };
 
-    FbxPropertyT<FbxDouble> Alpha;
-    FbxPropertyT<EWrapMode> WrapModeU, WrapModeV;
-    FbxPropertyT<FbxBool> UVSwap;
-    FbxPropertyT<FbxBool> PremultiplyAlpha;
-    FbxPropertyT<FbxDouble3> Translation, Rotation, Scaling; ///< (u, v, w); the angles in degrees
-    FbxPropertyT<FbxDouble3> RotationPivot, ScalingPivot;
-    FbxPropertyT<FbxString> UVSet;
+    FbxPropertyT<FbxDouble> Alpha;          ///< in files "Texture alpha"; 0 to 1; 1, animatable
+    FbxPropertyT<EWrapMode> WrapModeU,      ///< along u; eRepeat
+        WrapModeV;                          ///< along v; eRepeat
+    FbxPropertyT<FbxBool> UVSwap;           ///< whether u and v change places; false
+    FbxPropertyT<FbxBool> PremultiplyAlpha; ///< whether colours are multiplied by alpha; true
+    FbxPropertyT<FbxDouble3> Translation,   ///< (u, v, w); (0, 0, 0), animatable
+        Rotation,                           ///< about (u, v, w), degrees; (0, 0, 0), animatable
+        Scaling;                            ///< (u, v, w); (1, 1, 1), animatable
+    FbxPropertyT<FbxDouble3> RotationPivot, ///< in files TextureRotationPivot; (0, 0, 0)
+        ScalingPivot;                       ///< in files TextureScalingPivot; (0, 0, 0)
+    FbxPropertyT<FbxString> UVSet;          ///< the name of the set of texture coordinates; "default"
 
-    void SetTextureUse(ETextureUse pTextureUse);
-    [[nodiscard]] ETextureUse GetTextureUse() const;
+    void SetTextureUse(ETextureUse pTextureUse);     ///< In files TextureTypeUse.
+    [[nodiscard]] ETextureUse GetTextureUse() const; ///< eStandard by default and for a number that is no use.
+    /// In files CurrentMappingType, where the numbers of eNull and eUV have changed places.
     void SetMappingType(EMappingType pMappingType);
-    [[nodiscard]] EMappingType GetMappingType() const;
-    void SetSwapUV(bool pSwapUV);
-    [[nodiscard]] bool GetSwapUV() const;
-    void SetTranslation(double pU, double pV);
-    [[nodiscard]] double GetTranslationU() const;
-    [[nodiscard]] double GetTranslationV() const;
-    void SetScale(double pU, double pV);
-    [[nodiscard]] double GetScaleU() const;
-    [[nodiscard]] double GetScaleV() const;
-    void SetRotation(double pU, double pV, double pW = 0.0);
-    [[nodiscard]] double GetRotationU() const;
-    [[nodiscard]] double GetRotationV() const;
-    [[nodiscard]] double GetRotationW() const;
+    [[nodiscard]] EMappingType GetMappingType() const;       ///< eUV by default, eNull for a number that is no mapping.
+    void SetSwapUV(bool pSwapUV);                            ///< The property UVSwap.
+    [[nodiscard]] bool GetSwapUV() const;                    ///< False by default.
+    void SetTranslation(double pU, double pV);               ///< Sets u and v of the property Translation; w stays.
+    [[nodiscard]] double GetTranslationU() const;            ///< 0 by default.
+    [[nodiscard]] double GetTranslationV() const;            ///< 0 by default.
+    void SetScale(double pU, double pV);                     ///< Sets u and v of the property Scaling; w stays.
+    [[nodiscard]] double GetScaleU() const;                  ///< 1 by default.
+    [[nodiscard]] double GetScaleV() const;                  ///< 1 by default.
+    void SetRotation(double pU, double pV, double pW = 0.0); ///< Sets the property Rotation, degrees.
+    [[nodiscard]] double GetRotationU() const;               ///< Degrees.
+    [[nodiscard]] double GetRotationV() const;               ///< Degrees.
+    [[nodiscard]] double GetRotationW() const;               ///< Degrees; the turn within the plane of u and v.
 
 private:
     FbxPropertyT<FbxEnum> mTextureUse, mMapping;
 };
 
-/// An image file. Names are stored as given; no file is touched.
+/// A texture whose image is a file. Names are stored as given, UTF-8; no file is touched.
 class FBXSDK_DLL FbxFileTexture : public FbxTexture {
     FBXSDK_OBJECT_DECLARE(FbxFileTexture, FbxTexture)
 
 public:
-    enum EMaterialUse { eModelMaterial, eDefaultMaterial };
+    /// Whether the material's own colour counts beside the texture; kept in memory, not in files.
+    enum EMaterialUse {
+        eModelMaterial,  ///< the model's material; the default
+        eDefaultMaterial ///< a default material
+    };
 
-    FbxPropertyT<FbxBool> UseMaterial;
-    FbxPropertyT<FbxBool> UseMipMap;
+    FbxPropertyT<FbxBool> UseMaterial; ///< whether the material's colour is mixed in; false
+    FbxPropertyT<FbxBool> UseMipMap;   ///< whether smaller images are used far away; false
 
     /// Null is the empty name. A relative name that is empty becomes the file's name without its folder. Always true.
     bool SetFileName(const char* pName);
-    [[nodiscard]] const char* GetFileName() const;
-    bool SetRelativeFileName(const char* pName);
-    [[nodiscard]] const char* GetRelativeFileName() const;
-    void SetMaterialUse(EMaterialUse pMaterialUse) { mMaterialUse = pMaterialUse; }
-    [[nodiscard]] EMaterialUse GetMaterialUse() const { return mMaterialUse; }
+    [[nodiscard]] const char* GetFileName() const;         ///< Never null; valid until the name changes.
+    bool SetRelativeFileName(const char* pName);           ///< Null is the empty name. Always true.
+    [[nodiscard]] const char* GetRelativeFileName() const; ///< Never null; valid until the name changes.
+    void SetMaterialUse(EMaterialUse pMaterialUse) { mMaterialUse = pMaterialUse; } ///< Any value is stored.
+    [[nodiscard]] EMaterialUse GetMaterialUse() const { return mMaterialUse; }      ///< eModelMaterial by default.
 
 private:
     std::string mFileName, mRelativeFileName;
     EMaterialUse mMaterialUse = eModelMaterial;
 };
 
-/// Several textures, its sources, over one another.
+/// Several textures over one another: its sources, the lowest first.
 class FBXSDK_DLL FbxLayeredTexture : public FbxTexture {
     FBXSDK_OBJECT_DECLARE(FbxLayeredTexture, FbxTexture)
 };

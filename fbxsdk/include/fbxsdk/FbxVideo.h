@@ -8,17 +8,17 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// Names are stored as given; no file is touched.
+/// An image or clip that textures show: a source of theirs. Names are stored as given, UTF-8; no file is touched.
 class FBXSDK_DLL FbxVideo : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxVideo, FbxObject)
 
 public:
-    void SetFileName(const char* pName);
-    [[nodiscard]] FbxString GetFileName() const;
-    void SetRelativeFileName(const char* pName);
-    [[nodiscard]] FbxString GetRelativeFileName() const;
-    [[nodiscard]] bool GetImageTextureMipMap() const { return mMipMap; }
-    void ImageTextureSetMipMap(bool pUseMipMap) { mMipMap = pUseMipMap; }
+    void SetFileName(const char* pName);                 ///< In files the property Path; null is the empty name.
+    [[nodiscard]] FbxString GetFileName() const;         ///< Empty by default.
+    void SetRelativeFileName(const char* pName);         ///< In files the property RelPath; null is the empty name.
+    [[nodiscard]] FbxString GetRelativeFileName() const; ///< Empty by default.
+    [[nodiscard]] bool GetImageTextureMipMap() const { return mMipMap; }  ///< False by default.
+    void ImageTextureSetMipMap(bool pUseMipMap) { mMipMap = pUseMipMap; } ///< Kept in memory; files are written with false.
 
 private:
     FbxPropertyT<FbxString> mPath, mRelativePath;
