@@ -83,6 +83,8 @@
 #include <fbxsdk/FbxVideo.h>
 
 #ifndef FBXSDK_NAMESPACE_USING
+/// Whether this header opens the namespace to its includer; a host that defines it as 0 before writes
+/// `fbxsdk::FbxNode`.
 #define FBXSDK_NAMESPACE_USING 1
 #endif
 #if FBXSDK_NAMESPACE_USING

@@ -13,27 +13,32 @@ FBXSDK_NAMESPACE_BEGIN
 class FbxBlendShapeChannel;
 class FbxGeometry;
 
-/// Channels are the blend shape's source objects of that class, in order of connection.
+/// Deformation toward other shapes of the same points. Channels are the blend shape's source objects of that class, in
+/// order of connection.
 class FBXSDK_DLL FbxBlendShape : public FbxDeformer {
     FBXSDK_OBJECT_DECLARE(FbxBlendShape, FbxDeformer)
 
 public:
-    [[nodiscard]] EDeformerType GetDeformerType() const override;
+    [[nodiscard]] EDeformerType GetDeformerType() const override; ///< eBlendShape.
 
-    /// Null when the blend shape deforms nothing.
+    /// The geometry that it deforms; null when there is none.
     [[nodiscard]] FbxGeometry* GetGeometry();
+    /// Makes it deform that geometry and no other; null takes it away. False when it cannot be connected.
     bool SetGeometry(FbxGeometry* pGeometry);
 
     /// False for null and when the channel is there already.
     bool AddBlendShapeChannel(FbxBlendShapeChannel* pBlendShapeChannel);
     /// Returns the channel, or null when it is none of the blend shape.
     FbxBlendShapeChannel* RemoveBlendShapeChannel(FbxBlendShapeChannel* pBlendShapeChannel);
+    /// How many channels there are.
     [[nodiscard]] int GetBlendShapeChannelCount() const { return static_cast<int>(mChannels.size()); }
-    /// Null out of range.
+    /// The channel at that place; null out of range.
     [[nodiscard]] FbxBlendShapeChannel* GetBlendShapeChannel(int pIndex);
+    /// The same for a blend shape that is not changed.
     [[nodiscard]] const FbxBlendShapeChannel* GetBlendShapeChannel(int pIndex) const;
 
 protected:
+    /// Keeps the list of channels in step with the connections.
     void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:

@@ -14,17 +14,19 @@ FBXSDK_NAMESPACE_BEGIN
 class FbxBlendShape;
 class FbxShape;
 
-/// Targets are the channel's source shapes, in order of connection.
+/// One weight of a blend shape and the target shapes that it leads through. Targets are the channel's source shapes, in
+/// order of connection.
 class FBXSDK_DLL FbxBlendShapeChannel : public FbxSubDeformer {
     FBXSDK_OBJECT_DECLARE(FbxBlendShapeChannel, FbxSubDeformer)
 
 public:
-    FbxPropertyT<FbxDouble> DeformPercent; ///< percent
+    FbxPropertyT<FbxDouble> DeformPercent; ///< percent; 0, animatable
 
-    [[nodiscard]] EType GetSubDeformerType() const override;
+    [[nodiscard]] EType GetSubDeformerType() const override; ///< eBlendShapeChannel.
 
-    /// Null when the channel is in none.
+    /// The blend shape that the channel is part of; null when it is in none.
     [[nodiscard]] FbxBlendShape* GetBlendShapeDeformer();
+    /// Makes it part of that blend shape and no other; null takes it out. False when it cannot be connected.
     bool SetBlendShapeDeformer(FbxBlendShape* pBlendShape);
 
     /// The percentage is the one at which the target is fully reached. False for null and when the shape is there
@@ -32,22 +34,26 @@ public:
     bool AddTargetShape(FbxShape* pShape, double pFullDeformPercent = 100);
     /// Returns the shape, or null when it is none of the channel's.
     FbxShape* RemoveTargetShape(FbxShape* pShape);
+    /// How many targets there are.
     [[nodiscard]] int GetTargetShapeCount() const { return static_cast<int>(mTargets.size()); }
-    /// Null out of range.
+    /// The target at that place; null out of range.
     [[nodiscard]] FbxShape* GetTargetShape(int pIndex);
+    /// The same for a channel that is not changed.
     [[nodiscard]] const FbxShape* GetTargetShape(int pIndex) const;
-    /// -1 when it is none of the channel's.
+    /// The place of the target; -1 when it is none of the channel's.
     [[nodiscard]] int GetTargetShapeIndex(const FbxShape* pShape) const;
 
     /// The full percentages, at least one per target; null when there are none. Those that were never given divide 100
     /// evenly: k targets have 100/k, 200/k, … 100. Good until targets or their number change.
     [[nodiscard]] double* GetTargetShapeFullWeights();
+    /// How many percentages there are; new ones are 0. Negative counts as 0.
     void SetFullWeightsCount(int pCount);
 
     /// For the scene reader: the percentages as the file has them.
     void setFullWeights(std::vector<double> pFullWeights) { mFullWeights = std::move(pFullWeights); }
 
 protected:
+    /// Keeps the list of targets, and their percentages, in step with the connections.
     void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:

@@ -8,24 +8,35 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A deformer is a source of the geometry that it deforms.
+/// What moves the points of geometry. A deformer is a source of the geometry that it deforms.
 class FBXSDK_DLL FbxDeformer : public FbxObject {
     FBXSDK_ABSTRACT_DECLARE(FbxDeformer, FbxObject)
 
 public:
-    enum EDeformerType { eUnknown, eSkin, eBlendShape, eVertexCache };
+    /// What kind of deformer it is.
+    enum EDeformerType {
+        eUnknown,    ///< none of the others
+        eSkin,       ///< FbxSkin
+        eBlendShape, ///< FbxBlendShape
+        eVertexCache ///< FbxVertexCacheDeformer
+    };
 
-    [[nodiscard]] virtual EDeformerType GetDeformerType() const;
+    [[nodiscard]] virtual EDeformerType GetDeformerType() const; ///< Of the class.
 };
 
-/// A sub-deformer is a source of its deformer.
+/// A part of a deformer, and a source of it.
 class FBXSDK_DLL FbxSubDeformer : public FbxObject {
     FBXSDK_ABSTRACT_DECLARE(FbxSubDeformer, FbxObject)
 
 public:
-    enum EType { eUnknown, eCluster, eBlendShapeChannel };
+    /// What kind of part it is.
+    enum EType {
+        eUnknown,          ///< none of the others
+        eCluster,          ///< FbxCluster
+        eBlendShapeChannel ///< FbxBlendShapeChannel
+    };
 
-    [[nodiscard]] virtual EType GetSubDeformerType() const;
+    [[nodiscard]] virtual EType GetSubDeformerType() const; ///< Of the class.
 };
 
 FBXSDK_NAMESPACE_END

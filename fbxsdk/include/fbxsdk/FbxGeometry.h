@@ -14,30 +14,34 @@ FBXSDK_NAMESPACE_BEGIN
 class FbxAnimCurve;
 class FbxAnimLayer;
 
-/// Deformers are the geometry's source objects of that class, in order of connection.
+/// Geometry that can be deformed. Deformers are its source objects of that class, in order of connection.
 class FBXSDK_DLL FbxGeometry : public FbxGeometryBase {
     FBXSDK_ABSTRACT_DECLARE(FbxGeometry, FbxGeometryBase)
 
 public:
-    /// The deformer's index, also when it is there already; -1 for null.
+    /// Connects the deformer behind those that there are. The deformer's index, also when it is there already; -1 for
+    /// null.
     int AddDeformer(FbxDeformer* pDeformer);
-    /// The removed deformer; null out of range.
+    /// The removed deformer, which lives on; null out of range, with a status.
     FbxDeformer* RemoveDeformer(int pIndex, FbxStatus* pStatus = nullptr);
-    [[nodiscard]] int GetDeformerCount() const { return static_cast<int>(mDeformers.size()); }
-    /// Null out of range.
+    [[nodiscard]] int GetDeformerCount() const { return static_cast<int>(mDeformers.size()); } ///< Of all types.
+    /// The deformer at that place; null out of range, with a status.
     [[nodiscard]] FbxDeformer* GetDeformer(int pIndex, FbxStatus* pStatus = nullptr) const;
-    // The same among the deformers of one type.
+    /// How many deformers of the type there are; 0 for eUnknown.
     [[nodiscard]] int GetDeformerCount(FbxDeformer::EDeformerType pType) const;
+    /// The deformer at that place among those of the type; null out of range, with a status.
     [[nodiscard]] FbxDeformer* GetDeformer(int pIndex, FbxDeformer::EDeformerType pType,
                                            FbxStatus* pStatus = nullptr) const;
 
     /// All target shapes of all channels of all blend shapes.
     [[nodiscard]] int GetShapeCount() const;
-    /// The curve of a channel's DeformPercent on the layer; null when there is none, also for bad indices.
+    /// The curve of a channel's DeformPercent on the layer, in percent; null when there is none, also for bad indices,
+    /// which the status tells. With pCreateAsNeeded a missing curve is made.
     FbxAnimCurve* GetShapeChannel(int pBlendShapeIndex, int pBlendShapeChannelIndex, FbxAnimLayer* pLayer,
                                   bool pCreateAsNeeded = false, FbxStatus* pStatus = nullptr);
 
 protected:
+    /// Keeps the list of deformers in step with the connections.
     void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:

@@ -9,21 +9,27 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
+/// Control points with layers. What a file holds of them is read when it is first asked for; a file that has been
+/// changed since then makes such a call throw std::runtime_error.
 class FBXSDK_DLL FbxGeometryBase : public FbxLayerContainer {
     FBXSDK_ABSTRACT_DECLARE(FbxGeometryBase, FbxLayerContainer)
 
 public:
-    FbxPropertyT<FbxBool> PrimaryVisibility, CastShadow, ReceiveShadow;
-    FbxPropertyT<FbxDouble3> BBoxMin, BBoxMax; ///< as the file states them; not kept up to date
+    FbxPropertyT<FbxBool> PrimaryVisibility, ///< in files "Primary Visibility"; true
+        CastShadow,                          ///< in files "Casts Shadows"; true
+        ReceiveShadow;                       ///< in files "Receive Shadows"; true
+    FbxPropertyT<FbxDouble3> BBoxMin,        ///< the smallest coordinates as the file states them; not kept up to date
+        BBoxMax;                             ///< the largest coordinates as the file states them; not kept up to date
 
-    /// Exactly that many points, all of them (0, 0, 0, 1).
+    /// Exactly that many points, all of them (0, 0, 0, 1). Negative counts as 0.
     virtual void InitControlPoints(int pCount);
-    [[nodiscard]] virtual int GetControlPointsCount() const;
-    /// One contiguous run, good until the count changes. Null when there are no points; the status then says so.
+    [[nodiscard]] virtual int GetControlPointsCount() const; ///< 0 for new geometry.
+    /// One contiguous run in the geometry's own space, valid until the count changes; writing to it changes the points.
+    /// Null when there are no points; the status then says so.
     [[nodiscard]] virtual FbxVector4* GetControlPoints(FbxStatus* pStatus = nullptr) const;
     /// No effect out of range.
     virtual void SetControlPointAt(const FbxVector4& pCtrlPoint, int pIndex);
-    /// (0, 0, 0, 1) out of range.
+    /// A copy of the point; (0, 0, 0, 1) out of range.
     [[nodiscard]] virtual FbxVector4 GetControlPointAt(int pIndex) const;
 
     /// The platform's own view: the points as they are, without asking the file.

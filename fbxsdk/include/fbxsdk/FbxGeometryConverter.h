@@ -12,6 +12,7 @@ class FbxManager;
 class FbxNodeAttribute;
 class FbxScene;
 
+/// Makes meshes of triangles from surfaces and from other meshes.
 class FBXSDK_DLL FbxGeometryConverter {
 public:
     /// Objects are made by the manager of what is converted, whichever this one is.

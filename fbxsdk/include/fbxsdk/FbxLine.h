@@ -8,29 +8,32 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// Each entry of the index array is a control point, or, with all bits inverted, the last one of its polyline.
+/// Polylines. Each entry of the index array is a control point, or, with all bits inverted, the last one of its
+/// polyline.
 class FBXSDK_DLL FbxLine : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxLine, FbxGeometry)
 
 public:
-    FbxPropertyT<FbxBool> Renderable;
+    FbxPropertyT<FbxBool> Renderable; ///< false by default
 
-    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eLine.
 
-    void SetIndexArraySize(int pCount);
-    [[nodiscard]] int GetIndexArraySize() const;
-    /// False out of range.
+    void SetIndexArraySize(int pCount);          ///< New entries are control point 0. Negative counts as 0.
+    [[nodiscard]] int GetIndexArraySize() const; ///< The entries of all polylines.
+    /// Sets an entry to a control point, which need not exist. False out of range and for a negative point.
     bool SetPointIndexAt(int pValue, int pIndex, bool pAsEndPoint = false);
     /// The control point, also at the end of a polyline; -1 out of range.
     [[nodiscard]] int GetPointIndexAt(int pIndex) const;
-    /// How many polylines there are, and where in the index array each one ends; -1 out of range.
+    /// How many polylines there are; a last one without an end does not count.
     [[nodiscard]] int GetEndPointCount() const;
+    /// Where in the index array that polyline ends; -1 out of range.
     [[nodiscard]] int GetEndPointAt(int pEndPointIndex) const;
 
     /// The platform's own view: as it is, without asking the file.
     [[nodiscard]] detail::PlainArray<int>& indices() { return mIndices; }
 
 protected:
+    /// Fills the object from the file.
     bool readSource(const detail::GeometrySource& pSource) override;
 
 private:

@@ -8,13 +8,15 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
+/// A NURBS surface as older programs write it; FbxGeometryConverter makes meshes of it.
 class FBXSDK_DLL FbxNurbs : public FbxNurbsSurfaceBase {
     FBXSDK_OBJECT_DECLARE(FbxNurbs, FbxGeometry)
 
 public:
-    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eNurbs.
 
 protected:
+    /// Fills the object from the file.
     bool readSource(const detail::GeometrySource& pSource) override;
 };
 

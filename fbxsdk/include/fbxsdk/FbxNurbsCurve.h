@@ -10,44 +10,58 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// Knot counts are those of surfaces. The w of a control point is its weight and not multiplied into x, y, z.
+/// A NURBS curve. Knot counts are those of surfaces (FbxNurbsSurfaceBase). The w of a control point is its weight and
+/// not multiplied into x, y, z.
 class FBXSDK_DLL FbxNurbsCurve : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxNurbsCurve, FbxGeometry)
 
 public:
-    enum EDimension { e2D = 2, e3D = 3 };
-    enum EType { eOpen, eClosed, ePeriodic };
+    /// In which space the points lie.
+    enum EDimension {
+        e2D = 2, ///< in the parameters of a surface, for trimming
+        e3D = 3  ///< in space; the default
+    };
+    /// How the curve ends.
+    enum EType {
+        eOpen,    ///< at its last points; the default
+        eClosed,  ///< where it began
+        ePeriodic ///< where it began, without a corner
+    };
 
-    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eNurbsCurve.
 
     using FbxGeometry::InitControlPoints;
-    /// Sizes points and knots. To be called after SetOrder.
+    /// Sizes points and knots, which become zero; no knots when the order does not fit the count. To be called after
+    /// SetOrder.
     void InitControlPoints(int pCount, EType pVType);
-    void SetOrder(int pOrder);
-    [[nodiscard]] int GetOrder() const;
-    [[nodiscard]] EType GetType() const;
-    [[nodiscard]] int GetKnotCount() const;
-    /// Null when there are none.
+    void SetOrder(int pOrder);              ///< The degree plus one; points and knots stay.
+    [[nodiscard]] int GetOrder() const;     ///< 4 by default.
+    [[nodiscard]] EType GetType() const;    ///< eOpen by default.
+    [[nodiscard]] int GetKnotCount() const; ///< 0 until points are made.
+    /// The knots, ascending; writing to them changes the curve. Null when there are none; valid until their number
+    /// changes.
     [[nodiscard]] double* GetKnotVector() const;
-    void SetStep(int pStep);
-    [[nodiscard]] int GetStep() const;
-    void SetDimension(EDimension pDimension);
-    [[nodiscard]] EDimension GetDimension() const;
-    /// Whether the weights count.
+    void SetStep(int pStep);                       ///< Subdivisions of each span between knots, for display.
+    [[nodiscard]] int GetStep() const;             ///< 4 by default.
+    void SetDimension(EDimension pDimension);      ///< The third coordinate of 2D curves is of no effect.
+    [[nodiscard]] EDimension GetDimension() const; ///< e3D by default.
+    /// Whether the weights count, as the file says; false for curves made in memory.
     [[nodiscard]] bool IsRational() const;
 
+    /// What the curve consists of beside its points.
     struct Content {
-        int order = 4;
-        int step = 4;
-        EType type = eOpen;
-        EDimension dimension = e3D;
-        bool rational = false;
-        std::vector<double> knots;
+        int order = 4;              ///< the degree plus one
+        int step = 4;               ///< subdivisions of each span
+        EType type = eOpen;         ///< how it ends
+        EDimension dimension = e3D; ///< in which space
+        bool rational = false;      ///< whether the weights count
+        std::vector<double> knots;  ///< ascending
     };
     /// The platform's own view: as it is, without asking the file.
     [[nodiscard]] Content& content() { return mContent; }
 
 protected:
+    /// Fills the object from the file.
     bool readSource(const detail::GeometrySource& pSource) override;
 
 private:

@@ -8,51 +8,61 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// U runs fastest through the control points.
+/// A surface of spline patches; FbxGeometryConverter makes meshes of it. U runs fastest through the control points.
 class FBXSDK_DLL FbxPatch : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxPatch, FbxGeometry)
 
 public:
-    enum EType { eBezier, eBezierQuadric, eCardinal, eBSpline, eLinear };
+    /// The splines of a direction.
+    enum EType {
+        eBezier,        ///< cubic Bézier; the default
+        eBezierQuadric, ///< quadratic Bézier
+        eCardinal,      ///< cubic through the points
+        eBSpline,       ///< cubic near the points
+        eLinear         ///< straight lines
+    };
 
-    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< ePatch.
 
     using FbxGeometry::InitControlPoints;
+    /// Sizes the points, all of them (0, 0, 0, 1): none unless both counts are positive.
     void InitControlPoints(int pUCount, EType pUType, int pVCount, EType pVType);
-    [[nodiscard]] int GetUCount() const { return direction(0).count; }
-    [[nodiscard]] int GetVCount() const { return direction(1).count; }
-    [[nodiscard]] EType GetPatchUType() const { return direction(0).type; }
-    [[nodiscard]] EType GetPatchVType() const { return direction(1).type; }
+    [[nodiscard]] int GetUCount() const { return direction(0).count; }      ///< Control points along u.
+    [[nodiscard]] int GetVCount() const { return direction(1).count; }      ///< Control points along v.
+    [[nodiscard]] EType GetPatchUType() const { return direction(0).type; } ///< eBezier by default.
+    [[nodiscard]] EType GetPatchVType() const { return direction(1).type; } ///< eBezier by default.
 
     /// Subdivisions of each segment between control points, for display and tessellation.
     void SetStep(int pUStep, int pVStep);
-    [[nodiscard]] int GetUStep() const { return direction(0).step; }
-    [[nodiscard]] int GetVStep() const { return direction(1).step; }
+    [[nodiscard]] int GetUStep() const { return direction(0).step; } ///< 4 by default.
+    [[nodiscard]] int GetVStep() const { return direction(1).step; } ///< 4 by default.
 
     /// A closed direction runs on from its last control points to its first.
     void SetClosed(bool pU, bool pV);
-    [[nodiscard]] bool GetUClosed() const { return direction(0).closed; }
-    [[nodiscard]] bool GetVClosed() const { return direction(1).closed; }
+    [[nodiscard]] bool GetUClosed() const { return direction(0).closed; } ///< False by default.
+    [[nodiscard]] bool GetVClosed() const { return direction(1).closed; } ///< False by default.
 
-    void SetUCapped(bool pUBottom, bool pUTop);
-    [[nodiscard]] bool GetUCappedBottom() const { return direction(0).cappedBottom; }
-    [[nodiscard]] bool GetUCappedTop() const { return direction(0).cappedTop; }
-    void SetVCapped(bool pVBottom, bool pVTop);
-    [[nodiscard]] bool GetVCappedBottom() const { return direction(1).cappedBottom; }
-    [[nodiscard]] bool GetVCappedTop() const { return direction(1).cappedTop; }
+    void SetUCapped(bool pUBottom, bool pUTop); ///< Whether the ends along u are filled; stored for applications.
+    [[nodiscard]] bool GetUCappedBottom() const { return direction(0).cappedBottom; } ///< False by default.
+    [[nodiscard]] bool GetUCappedTop() const { return direction(0).cappedTop; }       ///< False by default.
+    void SetVCapped(bool pVBottom, bool pVTop); ///< Whether the ends along v are filled; stored for applications.
+    [[nodiscard]] bool GetVCappedBottom() const { return direction(1).cappedBottom; } ///< False by default.
+    [[nodiscard]] bool GetVCappedTop() const { return direction(1).cappedTop; }       ///< False by default.
 
+    /// One parameter direction.
     struct Direction {
-        int count = 0;
-        int step = 4;
-        EType type = eBezier;
-        bool closed = false;
-        bool cappedBottom = false;
-        bool cappedTop = false;
+        int count = 0;             ///< control points
+        int step = 4;              ///< subdivisions of each segment
+        EType type = eBezier;      ///< its splines
+        bool closed = false;       ///< whether it runs on to its first points
+        bool cappedBottom = false; ///< whether its beginning is filled
+        bool cappedTop = false;    ///< whether its end is filled
     };
     /// The platform's own view: 0 is U, 1 is V; as it is, without asking the file.
     [[nodiscard]] Direction& parameters(int pDirection) { return mDirections[pDirection]; }
 
 protected:
+    /// Fills the object from the file.
     bool readSource(const detail::GeometrySource& pSource) override;
 
 private:

@@ -33,6 +33,7 @@ public:
     /// Whether the folder exists and has nothing in it.
     [[nodiscard]] static bool IsEmpty(const char* pFolderPathUTF8);
 
+    /// Whether it begins neither with a separator nor with a drive.
     [[nodiscard]] static bool IsRelative(const char* pPath);
     /// The folder as seen from the root folder, "." when they are the same.
     ///

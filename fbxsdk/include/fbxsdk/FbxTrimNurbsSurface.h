@@ -14,45 +14,52 @@ class FBXSDK_DLL FbxBoundary : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxBoundary, FbxGeometry)
 
 public:
+    /// "OuterBoundary": the name of the property that marks the outline of the surface, as against holes.
     static const char* const sOuterFlag;
 
-    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eBoundary.
 
-    void AddCurve(FbxNurbsCurve* pCurve);
-    [[nodiscard]] int GetCurveCount() const;
-    /// Null out of range.
+    void AddCurve(FbxNurbsCurve* pCurve);    ///< Null and a curve that is there already change nothing.
+    [[nodiscard]] int GetCurveCount() const; ///< How many curves the outline consists of.
+    /// The curve at that place; null out of range.
     [[nodiscard]] FbxNurbsCurve* GetCurve(int pIndex) const;
 
 protected:
+    /// A boundary has nothing in the file beyond its curves.
     bool readSource(const detail::GeometrySource& pSource) override;
 };
 
-/// Surface and boundaries are the object's sources.
+/// A NURBS surface cut by boundaries. Surface and boundaries are the object's sources.
 class FBXSDK_DLL FbxTrimNurbsSurface : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxTrimNurbsSurface, FbxGeometry)
 
 public:
-    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eTrimNurbsSurface.
 
+    /// Replaces the surface that is cut; null removes it. The surface stays its manager's.
     void SetNurbsSurface(const FbxNurbsSurface* pNurbs);
-    [[nodiscard]] FbxNurbsSurface* GetNurbsSurface() const;
-    bool AddBoundary(FbxBoundary* pBoundary);
-    [[nodiscard]] int GetBoundaryCount() const;
-    /// Null out of range.
+    [[nodiscard]] FbxNurbsSurface* GetNurbsSurface() const; ///< Null when there is none.
+    bool AddBoundary(FbxBoundary* pBoundary);               ///< False for null and when it is there already.
+    [[nodiscard]] int GetBoundaryCount() const;             ///< How many boundaries there are.
+    /// The boundary at that place; null out of range.
     [[nodiscard]] FbxBoundary* GetBoundary(int pIndex) const;
-    void SetFlipNormals(bool pFlip);
-    [[nodiscard]] bool GetFlipNormals() const;
+    void SetFlipNormals(bool pFlip);           ///< Whether the normals point against those of the surface.
+    [[nodiscard]] bool GetFlipNormals() const; ///< False by default.
 
-    // The points are those of the surface.
+    /// The points are those of the surface; 0 without one.
     [[nodiscard]] int GetControlPointsCount() const override;
+    /// Those of the surface. Null without a surface, the status untouched then, and without points.
     [[nodiscard]] FbxVector4* GetControlPoints(FbxStatus* pStatus = nullptr) const override;
+    /// Changes the surface; no effect without one and out of range.
     void SetControlPointAt(const FbxVector4& pCtrlPoint, int pIndex) override;
+    /// Of the surface; (0, 0, 0, 1) without one and out of range.
     [[nodiscard]] FbxVector4 GetControlPointAt(int pIndex) const override;
 
     /// The platform's own view: as it is, without asking the file.
     [[nodiscard]] bool& flipNormals() { return mFlipNormals; }
 
 protected:
+    /// Fills the object from the file.
     bool readSource(const detail::GeometrySource& pSource) override;
 
 private:

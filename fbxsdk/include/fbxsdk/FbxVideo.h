@@ -17,8 +17,10 @@ public:
     [[nodiscard]] FbxString GetFileName() const;         ///< Empty by default.
     void SetRelativeFileName(const char* pName);         ///< In files the property RelPath; null is the empty name.
     [[nodiscard]] FbxString GetRelativeFileName() const; ///< Empty by default.
-    [[nodiscard]] bool GetImageTextureMipMap() const { return mMipMap; }  ///< False by default.
-    void ImageTextureSetMipMap(bool pUseMipMap) { mMipMap = pUseMipMap; } ///< Kept in memory; files are written with false.
+    [[nodiscard]] bool GetImageTextureMipMap() const { return mMipMap; } ///< False by default.
+    void ImageTextureSetMipMap(bool pUseMipMap) {
+        mMipMap = pUseMipMap;
+    } ///< Kept in memory; files are written with false.
 
 private:
     FbxPropertyT<FbxString> mPath, mRelativePath;

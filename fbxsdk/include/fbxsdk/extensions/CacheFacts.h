@@ -18,45 +18,52 @@ namespace extensions {
 
 /// A channel as the description of a Maya cache has it. Times are frames at the rate of the cache.
 struct CacheChannelFacts {
-    std::string name, type, interpretation;
-    bool regular = true;
-    double step = 1.0; ///< frames between samples
-    double start = 0.0, end = 0.0;
+    std::string name,    ///< UTF-8
+        type,            ///< "DoubleVectorArray" and so on
+        interpretation;  ///< what the numbers are, "Points" or "positions" mostly
+    bool regular = true; ///< samples at equal distances
+    double step = 1.0;   ///< frames between samples
+    double start = 0.0,  ///< frame of the first sample
+        end = 0.0;       ///< frame of the last sample
 };
 
 /// The numbers of one channel at one time. Small: there may be as many as a file has bytes for.
 struct CacheSampleFacts {
     /// At the rate of the cache; of a Max cache at that of the scene, of a data file without description at 24.
     double frame = 0.0;
-    std::uint32_t file = 0;              ///< index into CacheFacts::fileNames
-    std::uint32_t channel = 0;           ///< index into CacheFacts::channelNames
-    std::uint64_t count = 0;             ///< points, or numbers of a channel that has no vectors
-    std::uint64_t offset = 0, bytes = 0; ///< of the numbers, in the file
-    std::uint8_t components = 3;
-    bool doubles = true;
+    std::uint32_t file = 0;      ///< index into CacheFacts::fileNames
+    std::uint32_t channel = 0;   ///< index into CacheFacts::channelNames
+    std::uint64_t count = 0;     ///< points, or numbers of a channel that has no vectors
+    std::uint64_t offset = 0,    ///< of the numbers, in the file
+        bytes = 0;               ///< that the numbers take
+    std::uint8_t components = 3; ///< numbers for each point
+    bool doubles = true;         ///< else floats or whole numbers
 };
 
+/// Something that is wrong with a cache.
 struct CacheFaultFacts {
-    std::string file;
-    std::uint64_t offset = 0;
-    std::string reason;
+    std::string file;         ///< its name
+    std::uint64_t offset = 0; ///< where in the file
+    std::string reason;       ///< what is wrong, a sentence
 };
 
+/// What is in a cache.
 struct CacheFacts {
-    FbxCache::EFileFormat format = FbxCache::eUnknownFileFormat;
-    std::string description; ///< the .xml file; empty where there is none
-    bool oneFile = true;     ///< else a data file per sample
-    bool wide = false;       ///< 64-bit chunks (.mcx)
-    double frameRate = 0.0;  ///< frames per second; 0: the cache does not say
-    double start = 0.0, end = 0.0;
-    double framesPerSample = 1.0;          ///< as a Max cache has it
-    std::uint64_t statedSamples = 0;       ///< by a Max cache's header
-    std::uint64_t bytes = 0;               ///< of all data files
-    std::vector<std::string> fileNames;    ///< of the data files that there are
-    std::vector<std::string> channelNames; ///< that samples have; one without letters for a Max cache
-    std::vector<CacheChannelFacts> channels;
-    std::vector<CacheSampleFacts> samples; ///< by time
-    std::vector<CacheFaultFacts> faults;
+    FbxCache::EFileFormat format = FbxCache::eUnknownFileFormat; ///< by the content of the file
+    std::string description;                                     ///< the .xml file; empty where there is none
+    bool oneFile = true;                                         ///< else a data file per sample
+    bool wide = false;                                           ///< 64-bit chunks (.mcx)
+    double frameRate = 0.0;                                      ///< frames per second; 0: the cache does not say
+    double start = 0.0,                                          ///< frame of the first sample
+        end = 0.0;                                               ///< frame of the last sample
+    double framesPerSample = 1.0;                                ///< as a Max cache has it
+    std::uint64_t statedSamples = 0;                             ///< by a Max cache's header
+    std::uint64_t bytes = 0;                                     ///< of all data files
+    std::vector<std::string> fileNames;                          ///< of the data files that there are
+    std::vector<std::string> channelNames;   ///< that samples have; one without letters for a Max cache
+    std::vector<CacheChannelFacts> channels; ///< of the description
+    std::vector<CacheSampleFacts> samples;   ///< by time
+    std::vector<CacheFaultFacts> faults;     ///< what is wrong; empty for a sound cache
 };
 
 /// Looks into a cache: a description, a data file, or a Max point cache; its content says which. A data file is taken

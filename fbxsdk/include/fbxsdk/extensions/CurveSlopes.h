@@ -13,11 +13,13 @@ namespace extensions {
 
 /// What evaluation uses on both sides of a key. At the ends, and for an index out of range, there is nothing: zero.
 struct KeySlopes {
-    double left = 0.0, right = 0.0; ///< per second
-    /// Lengths of the handles, as parts of the pieces of the curve that they stand in.
-    double leftWeight = 0.0, rightWeight = 0.0;
+    double left = 0.0,       ///< per second
+        right = 0.0;         ///< per second
+    double leftWeight = 0.0, ///< length of the handle, as a part of the piece before the key
+        rightWeight = 0.0;   ///< length of the handle, as a part of the piece behind it
 };
 
+/// The slopes of the key of that index; zero for those that an end of the curve does not have.
 [[nodiscard]] FBXSDK_DLL KeySlopes slopesAt(const FbxAnimCurve& curve, int key);
 
 } // namespace extensions

@@ -13,6 +13,7 @@
 #include <fbxsdk/FbxScene.h>
 
 FBXSDK_NAMESPACE_BEGIN
+/// What this platform knows beyond the documented API. `<fbxsdk.h>` does not include it.
 namespace extensions {
 
 /// The number by which the file names the object in its connections; 0 when the object comes from no file. Files before

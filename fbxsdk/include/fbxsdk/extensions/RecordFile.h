@@ -25,50 +25,61 @@ namespace extensions {
 
 /// One value of a record.
 struct RecordValue {
+    /// What the value is.
     enum EType {
-        eInteger,
-        eReal,
-        eText,
-        eBytes,
-        eWord, ///< a bare word of an ASCII file, a single letter of a binary one
-        eList  ///< an array, or the many numbers that files before 7.0 list one by one
+        eInteger, ///< a whole number
+        eReal,    ///< a number with a fraction
+        eText,    ///< text
+        eBytes,   ///< bytes of any meaning
+        eWord,    ///< a bare word of an ASCII file, a single letter of a binary one
+        eList     ///< an array, or the many numbers that files before 7.0 list one by one
     };
-    EType type = eInteger;
+    EType type = eInteger; ///< which of the following members count
     /// The letter of the type in a binary file: I, L, D, S …, of a list that of its elements (i, d … for an array, I, D
     /// … for single numbers); 0 in an ASCII file.
     char code = 0;
-    std::int64_t integer = 0;
-    double real = 0.0;
-    std::string_view text; ///< of texts, bytes and words, as the file has them
+    std::int64_t integer = 0; ///< of whole numbers
+    double real = 0.0;        ///< of numbers with a fraction
+    std::string_view text;    ///< of texts, bytes and words, as the file has them
 
     // Of lists.
     std::uint64_t count = 0;       ///< numbers
     std::uint64_t storedBytes = 0; ///< that they take in the file
-    enum EElement { eInt8, eInt32, eInt64, eFloat32, eFloat64, eWritten };
+    /// How the numbers of a list are stored.
+    enum EElement {
+        eInt8,    ///< 8 bits
+        eInt32,   ///< 32 bits
+        eInt64,   ///< 64 bits
+        eFloat32, ///< single precision
+        eFloat64, ///< double precision
+        eWritten  ///< as digits, in an ASCII file
+    };
     EElement element = eFloat64; ///< eWritten: as digits, in an ASCII file
-    bool compressed = false;
+    bool compressed = false;     ///< the list's bytes are deflated
 };
 
 /// A handle to one record; valid as long as its file. An empty one stands for "there is none".
 class FBXSDK_DLL FileRecord {
 public:
     FileRecord() = default;
-    explicit FileRecord(const detail::Record* record) : mRecord(record) {}
+    explicit FileRecord(const detail::Record* record) : mRecord(record) {} ///< The platform's own.
 
+    /// Whether there is a record; the other calls need one.
     explicit operator bool() const { return mRecord != nullptr; }
-    [[nodiscard]] std::string_view name() const;
+    [[nodiscard]] std::string_view name() const; ///< As the file has it; valid as long as the file.
     /// The offset of its first byte in a binary file, the number of its line in an ASCII one.
     [[nodiscard]] std::uint64_t location() const;
     /// Whether a block follows its values, which may be empty.
     [[nodiscard]] bool hasBlock() const;
-    [[nodiscard]] FileRecord firstChild() const;
-    [[nodiscard]] FileRecord nextSibling() const;
+    [[nodiscard]] FileRecord firstChild() const;  ///< The first record of the block; empty when there is none.
+    [[nodiscard]] FileRecord nextSibling() const; ///< The next record of the same block; empty after the last.
 
-    [[nodiscard]] std::size_t valueCount() const;
+    [[nodiscard]] std::size_t valueCount() const; ///< How many values stand before the block.
     /// An integer 0 for an index out of range.
     [[nodiscard]] RecordValue value(std::size_t index) const;
     /// The first numbers of the record's list. False, and zeros, when there are fewer or the array is damaged.
     [[nodiscard]] bool readNumbers(double* destination, std::size_t count) const;
+    /// The same as whole numbers, those with a fraction truncated toward zero.
     [[nodiscard]] bool readNumbers(std::int64_t* destination, std::size_t count) const;
 
     /// The platform's own view of the record.
@@ -89,9 +100,9 @@ public:
 
     /// As the head of the file says; 0 when an ASCII file says nothing.
     [[nodiscard]] std::uint32_t version() const;
-    [[nodiscard]] bool isAscii() const;
-    [[nodiscard]] bool isBigEndian() const;
-    [[nodiscard]] std::uint64_t size() const;
+    [[nodiscard]] bool isAscii() const;     ///< Text, else binary.
+    [[nodiscard]] bool isBigEndian() const; ///< Whether a binary file has its highest bytes first, as some old ones do.
+    [[nodiscard]] std::uint64_t size() const; ///< Bytes of the file.
     /// The first record of the top level.
     [[nodiscard]] FileRecord first() const;
     /// The offset behind the record and its block in a binary file; 0 in an ASCII one.
