@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// An affine transform: translation, rotation, scale.
 #pragma once
 
 #include <fbxsdk/FbxQuaternion.h>

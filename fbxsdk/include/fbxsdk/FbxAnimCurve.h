@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Animation curves: keys over time and their interpolation.
 #pragma once
 
 #include <memory>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The joint between a property and the curves of its components on one layer.
 #pragma once
 
 #include <string>
@@ -70,7 +68,7 @@ public:
     void arrangeChannels(const std::vector<double>& pComponents);
     [[nodiscard]] double channelValue(unsigned int pChannelId) const; ///< 0 out of range.
     void setChannelValue(unsigned int pChannelId, double pValue);     ///< No effect out of range.
-    /// In how many of the channels the curve stands.
+    /// How many of the channels the curve drives.
     [[nodiscard]] int usesOf(const FbxAnimCurve& pCurve) const;
 
 protected:
@@ -86,7 +84,7 @@ private:
     std::vector<Channel> mChannels;
     /// Index by name, once there are many and until their order changes.
     mutable std::unordered_map<std::string, int> mChannelIndex;
-    std::unordered_map<const FbxObject*, int> mUses; ///< of each curve, in how many channels it stands
+    std::unordered_map<const FbxObject*, int> mUses; ///< of each curve, how many channels it drives
 };
 
 FBXSDK_NAMESPACE_END

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// One layer of animation: a collection of curve nodes and how it combines with the layers below.
 #pragma once
 
 #include <fbxsdk/FbxCollection.h>

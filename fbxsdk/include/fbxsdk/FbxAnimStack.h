@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A take: a collection of animation layers with its time spans.
 #pragma once
 
 #include <fbxsdk/FbxCollection.h>
@@ -14,7 +12,7 @@ class FBXSDK_DLL FbxAnimStack : public FbxCollection {
     FBXSDK_OBJECT_DECLARE(FbxAnimStack, FbxCollection)
 
 public:
-    FbxPropertyT<FbxString> Description; ///< for people; empty
+    FbxPropertyT<FbxString> Description; ///< free text; empty
     FbxPropertyT<FbxTime> LocalStart,    ///< where the animation begins; zero
         LocalStop,                       ///< where it ends; zero
         ReferenceStart,                  ///< where the span for reference begins; zero

@@ -21,7 +21,7 @@
 /// \namespace fbxsdk
 /// The platform: our own implementation of the documented API, in the inline namespace `tarnell`.
 
-/// The platform's classes stand in an inline namespace: the sources read `fbxsdk::FbxNode` as documented, while the
+/// The platform's classes are in an inline namespace: the sources read `fbxsdk::FbxNode` as documented, while the
 /// symbols can never mix with those of another SDK that the same host has loaded.
 #define FBXSDK_NAMESPACE_BEGIN                                                                                         \
     namespace fbxsdk {                                                                                                 \

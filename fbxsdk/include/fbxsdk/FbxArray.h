@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A growing array with the API's `int` indices.
 #pragma once
 
 #include <algorithm>

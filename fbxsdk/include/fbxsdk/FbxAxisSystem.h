@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Axis systems: which way is up, which way is front, which hand; and the conversion of scenes between them.
 #pragma once
 
 #include <fbxsdk/FbxArch.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Deformation toward other shapes of the same points.
 #pragma once
 
 #include <vector>
@@ -34,7 +32,7 @@ public:
     [[nodiscard]] int GetBlendShapeChannelCount() const { return static_cast<int>(mChannels.size()); }
     /// The channel at that place; null out of range.
     [[nodiscard]] FbxBlendShapeChannel* GetBlendShapeChannel(int pIndex);
-    /// The same for a blend shape that is not changed.
+    /// The same for a const blend shape.
     [[nodiscard]] const FbxBlendShapeChannel* GetBlendShapeChannel(int pIndex) const;
 
 protected:

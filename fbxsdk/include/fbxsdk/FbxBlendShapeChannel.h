@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// One weight of a blend shape and the target shapes that it leads through.
 #pragma once
 
 #include <utility>
@@ -38,13 +36,13 @@ public:
     [[nodiscard]] int GetTargetShapeCount() const { return static_cast<int>(mTargets.size()); }
     /// The target at that place; null out of range.
     [[nodiscard]] FbxShape* GetTargetShape(int pIndex);
-    /// The same for a channel that is not changed.
+    /// The same for a const channel.
     [[nodiscard]] const FbxShape* GetTargetShape(int pIndex) const;
     /// The place of the target; -1 when it is none of the channel's.
     [[nodiscard]] int GetTargetShapeIndex(const FbxShape* pShape) const;
 
     /// The full percentages, at least one per target; null when there are none. Those that were never given divide 100
-    /// evenly: k targets have 100/k, 200/k, … 100. Good until targets or their number change.
+    /// evenly: k targets have 100/k, 200/k, … 100. Valid until targets or their number change.
     [[nodiscard]] double* GetTargetShapeFullWeights();
     /// How many percentages there are; new ones are 0. Negative counts as 0.
     void SetFullWeightsCount(int pCount);

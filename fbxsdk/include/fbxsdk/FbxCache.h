@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A point cache beside an FBX file: Maya caches (.xml with .mc or .mcx) and Max point caches (.pc2).
 #pragma once
 
 #include <memory>

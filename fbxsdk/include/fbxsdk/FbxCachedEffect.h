@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// An effect whose result is held in a cache.
 #pragma once
 
 #include <fbxsdk/FbxNodeAttribute.h>

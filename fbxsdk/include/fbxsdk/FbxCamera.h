@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A camera: film back, lens, view and clipping planes.
 #pragma once
 
 #include <fbxsdk/FbxNodeAttribute.h>

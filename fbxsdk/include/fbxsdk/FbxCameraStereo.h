@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A stereo rig: a camera with a left and a right eye.
 #pragma once
 
 #include <fbxsdk/FbxCamera.h>

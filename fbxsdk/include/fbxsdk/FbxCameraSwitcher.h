@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The switcher: which of the scene's cameras is live.
 #pragma once
 
 #include <fbxsdk/FbxNodeAttribute.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Class identities: the class tree of the platform's objects, for queries by class.
 #pragma once
 
 #include <fbxsdk/FbxArch.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Objects that hold others: documents, stacks, layers. Membership is a source connection.
 #pragma once
 
 #include <fbxsdk/FbxObject.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A colour of four doubles; 0 to 1 is the displayable range, but nothing is clamped.
 #pragma once
 
 #include <fbxsdk/FbxTypes.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Which objects a query over connections asks for.
 #pragma once
 
 #include <memory>

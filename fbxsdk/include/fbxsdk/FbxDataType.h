@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Data types of properties: what a property holds and how the type is spelt in files.
 #pragma once
 
 #include <fbxsdk/FbxTypes.h>
@@ -30,7 +28,7 @@ public:
     [[nodiscard]] bool Valid() const { return mInfo != nullptr; } ///< False for the undefined type alone.
     /// What values it holds; eFbxUndefined also for compounds.
     [[nodiscard]] EFbxType GetType() const { return mInfo ? mInfo->type : eFbxUndefined; }
-    /// For people, not unique; empty for the undefined type.
+    /// A name to show, not unique; empty for the undefined type.
     [[nodiscard]] const char* GetName() const { return mInfo ? mInfo->apiName : ""; }
     [[nodiscard]] bool Is(const FbxDataType& pOther) const { return mInfo == pOther.mInfo; } ///< The same as ==.
     /// Whether both are the same type.

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// What can be imported and exported as a whole.
 #pragma once
 
 #include <fbxsdk/FbxCollection.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The orders in which three Euler angles are applied.
 #pragma once
 
 #include <fbxsdk/FbxArch.h>
@@ -11,7 +9,7 @@ FBXSDK_NAMESPACE_BEGIN
 /// The orders in which three angles about the axes are applied.
 class FBXSDK_DLL FbxEuler {
 public:
-    /// The letters stand in the order of application: eOrderXYZ turns about X first, then Y, then Z. The numbers are
+    /// The letters are in the order of application: eOrderXYZ turns about X first, then Y, then Z. The numbers are
     /// those of files.
     enum EOrder : int {
         eOrderXYZ = 0,   ///< the order of matrices, and of nodes whose rotation is not active

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Geometry that can be deformed.
 #pragma once
 
 #include <vector>

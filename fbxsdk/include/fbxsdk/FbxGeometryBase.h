@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A node attribute with control points.
 #pragma once
 
 #include <fbxsdk/FbxLayer.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Surfaces become meshes.
 #pragma once
 
 #include <fbxsdk/FbxArch.h>
@@ -22,7 +20,7 @@ public:
     /// attribute itself when it is a mesh of triangles already. Null for other kinds and for degenerate surfaces.
     ///
     /// With pReplace the mesh takes the attribute's place on every node, and the attribute is destroyed; without, the
-    /// mesh stands beside it on every node. pLegacy makes no difference.
+    /// mesh is added to every node. pLegacy makes no difference.
     FbxNodeAttribute* Triangulate(FbxNodeAttribute* pNodeAttribute, bool pReplace, bool pLegacy = false);
     /// The same for every attribute of the scene that it applies to. False when one of them could not be converted.
     bool Triangulate(FbxScene* pScene, bool pReplace, bool pLegacy = false);

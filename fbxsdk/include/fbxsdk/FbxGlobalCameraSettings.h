@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The default camera and the seven producer cameras, which belong to the settings and not to the node tree.
 #pragma once
 
 #include <array>
@@ -37,7 +35,7 @@ public:
     /// "Producer Perspective" where the global settings name none. Never null; valid until the name changes.
     [[nodiscard]] const char* GetDefaultCamera() const;
 
-    /// Makes those of the seven cameras, and the switcher, that are not there. Each stands on a node of its own, which
+    /// Makes those of the seven cameras, and the switcher, that are not there. Each has a node of its own, which
     /// belongs to the scene and has no parent.
     void CreateProducerCameras();
     /// Destroys the seven cameras, the switcher and their nodes; pointers to them are invalid afterwards.

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Ambient light and fog, which files before 7.x have a place for.
 #pragma once
 
 #include <fbxsdk/FbxColor.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Axes, unit, time mode and other settings of a whole scene.
 #pragma once
 
 #include <fbxsdk/FbxAxisSystem.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Time settings of files before 7.x. The scene's time mode is in FbxGlobalSettings.
 #pragma once
 
 #include <fbxsdk/FbxTime.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// What importers and exporters share: a file name and the outcome of the last operation.
 #pragma once
 
 #include <string>

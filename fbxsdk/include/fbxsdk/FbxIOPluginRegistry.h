@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Which formats can be read and written.
 #pragma once
 
 #include <fbxsdk/FbxArch.h>

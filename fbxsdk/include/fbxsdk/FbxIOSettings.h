@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Options of import and export, addressed by paths such as "Import|AdvOptGrp|FileFormat|Fbx|Material".
 #pragma once
 
 #include <map>

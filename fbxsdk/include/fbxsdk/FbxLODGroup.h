@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A group of which one child is shown, by distance.
 #pragma once
 
 #include <fbxsdk/FbxNodeAttribute.h>

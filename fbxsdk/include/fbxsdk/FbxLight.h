@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A light.
 #pragma once
 
 #include <fbxsdk/FbxNodeAttribute.h>

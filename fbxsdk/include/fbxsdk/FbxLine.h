@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Polylines.
 #pragma once
 
 #include <fbxsdk/FbxGeometry.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The manager: owner of every object.
 #pragma once
 
 #include <memory>

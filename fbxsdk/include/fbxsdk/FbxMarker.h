@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A marker: a point that is captured, or that moves a character.
 #pragma once
 
 #include <fbxsdk/FbxColor.h>

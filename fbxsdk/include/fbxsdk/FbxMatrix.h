@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A general 4×4 matrix, stored as FbxAMatrix is.
 #pragma once
 
 #include <fbxsdk/FbxAMatrix.h>

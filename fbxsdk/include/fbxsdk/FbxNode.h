@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A node of the scene's tree: its transform, its children, and what stands on it.
 #pragma once
 
 #include <memory>
@@ -33,12 +31,15 @@ struct NodePivots;
 enum class PivotVector : unsigned char;
 } // namespace detail
 
-/// A place in the scene's tree: a transform, children, attributes (what stands there) and materials.
+/// A node of the scene's tree: a transform, children, attributes (what the node shows) and materials.
 ///
 /// Children, attributes and materials are the node's source objects of those classes, in order of connection. A node
 /// has at most one parent and is never below itself: a connection that would make it so is cut again at once, and a
-/// node that is connected to a second parent leaves the first. Angles are degrees; lengths are units of the scene
-/// (FbxGlobalSettings::GetSystemUnit).
+/// node that is connected to a second parent leaves the first.
+///
+/// Angles are degrees; lengths are units of the scene (FbxGlobalSettings::GetSystemUnit). Vectors of pivots come as (x,
+/// y, z, 1), and the w of what is set is ignored; a reference to one is valid until the same vector of the node is
+/// asked for again.
 class FBXSDK_DLL FbxNode : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxNode, FbxObject)
 
@@ -76,10 +77,10 @@ public:
     [[nodiscard]] int GetChildCount(bool pRecursive = false) const;
     /// The child at that place in order of connection; null out of range.
     [[nodiscard]] FbxNode* GetChild(int pIndex);
-    /// The same for a node that is not changed.
+    /// The same for a const node.
     [[nodiscard]] const FbxNode* GetChild(int pIndex) const;
     [[nodiscard]] FbxNode* GetParent() { return mParent; } ///< Null for the root node and for a node without a parent.
-    [[nodiscard]] const FbxNode* GetParent() const { return mParent; } ///< The same for a node that is not changed.
+    [[nodiscard]] const FbxNode* GetParent() const { return mParent; } ///< The same for a const node.
     /// The first node of the name below this one, each node before its children; among the children alone without
     /// pRecursive. Null when there is none and for a null name. Names have no history here: the initial name is the
     /// name.
@@ -93,12 +94,12 @@ public:
     /// The default attribute: that of the property DefaultAttributeIndex when it names one, else the first. Null
     /// without attributes.
     [[nodiscard]] FbxNodeAttribute* GetNodeAttribute();
-    /// The same for a node that is not changed.
+    /// The same for a const node.
     [[nodiscard]] const FbxNodeAttribute* GetNodeAttribute() const;
-    [[nodiscard]] int GetNodeAttributeCount() const; ///< How many attributes stand on the node; mostly none or one.
+    [[nodiscard]] int GetNodeAttributeCount() const; ///< Mostly none or one.
     /// The attribute at that place in order of connection; null out of range.
     [[nodiscard]] FbxNodeAttribute* GetNodeAttributeByIndex(int pIndex);
-    /// The same for a node that is not changed.
+    /// The same for a const node.
     [[nodiscard]] const FbxNodeAttribute* GetNodeAttributeByIndex(int pIndex) const;
 
     /// The default attribute when it is a mesh, else null.
@@ -136,8 +137,7 @@ public:
     /// The material at that place in order of connection; null out of range.
     [[nodiscard]] FbxSurfaceMaterial* GetMaterial(int pIndex) const;
 
-    // Transform. Vectors come as (x, y, z, 1), the w of what is set is ignored. A reference stays valid until the same
-    // value is asked for again. A number from a file that is no order or inherit type counts as the first.
+    // Transform.
 
     /// The order in which the angles of LclRotation are applied; in force when rotation is active.
     void SetRotationOrder(EPivotSet pPivotSet, EFbxRotationOrder pRotationOrder);
@@ -189,17 +189,17 @@ public:
     /// Sets pInheritType to what is stored. A number from a file that is no inherit type counts as eInheritRrSs.
     void GetTransformationInheritType(FbxTransform::EInheritType& pInheritType) const;
 
-    // Evaluation, over all layers of the scene's current stack; the static values at FBXSDK_TIME_INFINITE. The matrix
-    // is the node's own until it is evaluated again. Targets do not enter, and nothing needs to be forced: changes are
-    // seen.
+    // Evaluation.
 
-    /// The node's transform in the world at a time. The matrix is the node's own until it is evaluated again. The last
-    /// three arguments have no effect.
+    /// The node's transform in the world at a time: that of all layers of the scene's current stack, the static one at
+    /// FBXSDK_TIME_INFINITE and outside of scenes. All changes are seen. The matrix is the node's own and valid until
+    /// it is evaluated again. The last three arguments have no effect: the source pivots count, and targets are not
+    /// followed.
     FbxAMatrix& EvaluateGlobalTransform(FbxTime pTime = FBXSDK_TIME_INFINITE,
                                         FbxNode::EPivotSet pPivotSet = FbxNode::eSourcePivot, bool pApplyTarget = false,
                                         bool pForceEval = false);
-    /// The node's transform relative to its parent at a time: translation, pivots, rotation and scaling in one.
-    /// Otherwise the same, in a matrix of its own.
+    /// The node's transform relative to its parent at a time: translation, pivots, rotation and scaling in one, without
+    /// the geometric transform. Otherwise the same, in a matrix of its own.
     FbxAMatrix& EvaluateLocalTransform(FbxTime pTime = FBXSDK_TIME_INFINITE,
                                        FbxNode::EPivotSet pPivotSet = FbxNode::eSourcePivot, bool pApplyTarget = false,
                                        bool pForceEval = false);

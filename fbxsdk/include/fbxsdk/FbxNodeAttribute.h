@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The base of what can stand on a node: cameras, lights, geometry, …
 #pragma once
 
 #include <vector>
@@ -12,8 +10,8 @@ FBXSDK_NAMESPACE_BEGIN
 
 class FbxNode;
 
-/// What can stand on a node: cameras, lights, geometry, … One attribute may stand on several nodes. Also the class of
-/// attributes of a kind that the platform has no class for; their properties are kept.
+/// The base of what nodes carry: cameras, lights, geometry, … One attribute may belong to several nodes. Also the class
+/// of attributes of a kind that the platform has no class for; their properties are kept.
 class FBXSDK_DLL FbxNodeAttribute : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxNodeAttribute, FbxObject)
 
@@ -51,7 +49,7 @@ public:
 
     [[nodiscard]] virtual EType GetAttributeType() const; ///< eUnknown for an attribute without a class of its own.
 
-    /// How many nodes the attribute stands on; more than one for instances.
+    /// How many nodes carry the attribute; more than one for instances.
     [[nodiscard]] int GetNodeCount() const;
     /// The node at that place in order of connection; null out of range.
     [[nodiscard]] FbxNode* GetNode(int pIndex = 0) const;

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A null: a node that is only shown as a cross, or not at all.
 #pragma once
 
 #include <fbxsdk/FbxNodeAttribute.h>

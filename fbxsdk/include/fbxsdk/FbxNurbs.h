@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The NURBS surface of older writers.
 #pragma once
 
 #include <fbxsdk/FbxNurbsSurface.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A B-spline curve, in space or in the parameters of a surface.
 #pragma once
 
 #include <vector>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Rational B-spline surfaces.
 #pragma once
 
 #include <vector>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The base of everything a manager owns: a name, properties and connections.
 #pragma once
 
 #include <memory>
@@ -138,7 +136,8 @@ public:
     /// of another object.
     [[nodiscard]] FbxProperty GetNextProperty(const FbxProperty& pProperty) const;
 
-    // Connections. A source is an input or a child; order is the order of connection. An index out of range gives null.
+    // Connections.
+
     /// Makes the other object a source (an input or a child) of this one, behind those that there are. In a scene, what
     /// is in none joins the scene with everything that feeds it.
     ///
@@ -232,7 +231,7 @@ template <class T>
 [[nodiscard]] T* FbxCast(FbxObject* pObject) {
     return pObject && pObject->Is<T>() ? static_cast<T*>(pObject) : nullptr;
 }
-/// The same for an object that is not changed.
+/// The same for a const object.
 template <class T>
 [[nodiscard]] const T* FbxCast(const FbxObject* pObject) {
     return pObject && pObject->Is<T>() ? static_cast<const T*>(pObject) : nullptr;

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The reference of a group of optical markers.
 #pragma once
 
 #include <fbxsdk/FbxNodeAttribute.h>

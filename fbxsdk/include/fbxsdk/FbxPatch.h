@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Surfaces of spline patches.
 #pragma once
 
 #include <fbxsdk/FbxGeometry.h>

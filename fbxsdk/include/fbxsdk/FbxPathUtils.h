@@ -1,14 +1,13 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Paths as UTF-8 text. Both "/" and "\" separate on input, results use "/"; drive letters and "//server" are kept.
 #pragma once
 
 #include <fbxsdk/FbxString.h>
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A null path counts as the empty one; empty results are empty strings.
+/// Paths as UTF-8 text. Both "/" and "\" separate on input, results use "/"; drive letters and "//server" are kept. A
+/// null path counts as the empty one; empty results are empty strings.
 class FBXSDK_DLL FbxPathUtils {
 public:
     /// Root and file with one separator between; the file alone when it is absolute.
@@ -26,7 +25,7 @@ public:
     /// Whether the folder exists.
     [[nodiscard]] static bool Exist(const char* pFolderPathUTF8);
     /// Creates the folder and every missing parent. True also when it exists already; false when it cannot be created
-    /// or something that is no folder stands there.
+    /// or something that is no folder has the name.
     static bool Create(const char* pFolderPathUTF8);
     /// Deletes an empty folder; false when there is none or something is in it.
     static bool Delete(const char* pFolderPathUTF8);
@@ -43,7 +42,7 @@ public:
     [[nodiscard]] static FbxString GetRelativeFilePath(const char* pRootPath, const char* pNewFilePath);
     /// The absolute, cleaned path, from the current directory. Nothing needs to exist.
     [[nodiscard]] static FbxString Resolve(const char* pRelPath);
-    /// One kind of separator, none repeated or trailing, no "." and no ".." that something stands before; "." alone
+    /// One kind of separator, none repeated or trailing, no "." and no ".." behind a component; "." alone
     /// when nothing else is left. Does not look at the file system.
     [[nodiscard]] static FbxString Clean(const char* pPath);
     /// A path in the folder, beginning with the prefix, at which nothing exists yet.

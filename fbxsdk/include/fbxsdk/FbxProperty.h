@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Typed, named, animatable values of objects. A FbxProperty is a small handle: copying it does not copy the value.
 #pragma once
 
 #include <type_traits>
@@ -96,7 +94,7 @@ public:
 
     FbxProperty() = default; ///< An invalid property.
 
-    /// Whether the handle stands for a property, or for the root of some.
+    /// Whether the handle is that of a property or of an object's RootProperty.
     [[nodiscard]] bool IsValid() const { return mObject != nullptr; }
     /// The object that has the property; null when invalid.
     [[nodiscard]] FbxObject* GetFbxObject() const { return mObject; }

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A quaternion x, y, z, w. A rotation is one of length 1.
 #pragma once
 
 #include <fbxsdk/FbxVector4.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A scene: the node tree, the settings, and every object that belongs to them.
 #pragma once
 
 #include <memory>
@@ -32,7 +30,7 @@ public:
     [[nodiscard]] FbxNode* GetRootNode() const;
 
     [[nodiscard]] FbxGlobalSettings& GetGlobalSettings(); ///< Axes, unit, time mode; they live as long as the scene.
-    [[nodiscard]] const FbxGlobalSettings& GetGlobalSettings() const; ///< The same for a scene that is not changed.
+    [[nodiscard]] const FbxGlobalSettings& GetGlobalSettings() const; ///< The same for a const scene.
     /// Ambient light and fog; they live as long as the scene.
     [[nodiscard]] FbxGlobalLightSettings& GlobalLightSettings();
     [[nodiscard]] FbxGlobalCameraSettings& GlobalCameraSettings(); ///< The default camera and the producer cameras.

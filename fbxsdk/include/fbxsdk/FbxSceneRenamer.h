@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// How names are changed on export. The platform leaves them as they are, whatever is asked for.
 #pragma once
 
 #include <fbxsdk/FbxArch.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A target of a blend shape.
 #pragma once
 
 #include <fbxsdk/FbxGeometryBase.h>

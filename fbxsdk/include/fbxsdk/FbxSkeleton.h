@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A bone or joint.
 #pragma once
 
 #include <fbxsdk/FbxNodeAttribute.h>

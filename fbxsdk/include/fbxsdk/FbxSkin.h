@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Deformation by the movement of other nodes.
 #pragma once
 
 #include <vector>
@@ -37,7 +35,7 @@ public:
     [[nodiscard]] int GetClusterCount() const { return static_cast<int>(mClusters.size()); }
     /// The cluster at that place; null out of range.
     [[nodiscard]] FbxCluster* GetCluster(int pIndex);
-    /// The same for a skin that is not changed.
+    /// The same for a const skin.
     [[nodiscard]] const FbxCluster* GetCluster(int pIndex) const;
 
     /// The geometry that it deforms; null when there is none.

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The outcome of an operation: a code and a sentence.
 #pragma once
 
 #include <string>

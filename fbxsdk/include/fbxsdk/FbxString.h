@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// An owned byte string; UTF-8 wherever it crosses the API.
 #pragma once
 
 #include <cstddef>

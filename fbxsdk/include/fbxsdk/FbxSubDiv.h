@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A subdivision surface, as a kind of attribute; files hold none with content of its own.
 #pragma once
 
 #include <fbxsdk/FbxGeometry.h>

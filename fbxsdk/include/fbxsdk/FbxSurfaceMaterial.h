@@ -8,7 +8,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A material of any shading model. Materials stand on nodes (FbxNode::AddMaterial); which polygon has which is said by
+/// A material of any shading model. Nodes carry materials (FbxNode::AddMaterial); which polygon has which is said by
 /// layer elements.
 class FBXSDK_DLL FbxSurfaceMaterial : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxSurfaceMaterial, FbxObject)

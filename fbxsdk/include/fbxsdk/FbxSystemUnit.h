@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Units of length: how many centimetres one unit is, and the conversion of scenes between units.
 #pragma once
 
 #include <fbxsdk/FbxArch.h>

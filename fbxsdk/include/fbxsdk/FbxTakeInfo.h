@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// What a file says of one take.
 #pragma once
 
 #include <fbxsdk/FbxString.h>

@@ -86,7 +86,7 @@ public:
     [[nodiscard]] static EMode ConvertFrameRateToTimeMode(double pFrameRate, double pPrecision = 0.00000001);
 
     /// What eDefaultMode and eCustom mean on the calling thread; other threads keep theirs. The rate is used with
-    /// eCustom only; one that is not greater than zero stands for 30.
+    /// eCustom only; one that is not greater than zero counts as 30.
     static void SetGlobalTimeMode(EMode pTimeMode, double pFrameRate = 0.0);
     [[nodiscard]] static EMode GetGlobalTimeMode(); ///< Of the calling thread; eFrames30 at first.
 

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// How a node's transform takes up its parent's.
 #pragma once
 
 #include <fbxsdk/FbxArch.h>

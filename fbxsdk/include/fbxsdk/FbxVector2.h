@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A vector of two doubles.
 #pragma once
 
 #include <fbxsdk/FbxTypes.h>

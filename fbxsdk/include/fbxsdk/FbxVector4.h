@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A vector of four doubles: a point, direction, set of Euler angles (degrees) or scale with a w that mostly stays 1.
 #pragma once
 
 #include <fbxsdk/FbxTypes.h>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Points that come from a cache.
 #pragma once
 
 #include <fbxsdk/FbxDeformer.h>

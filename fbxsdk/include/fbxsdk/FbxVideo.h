@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The image or clip behind a texture.
 #pragma once
 
 #include <fbxsdk/FbxObject.h>

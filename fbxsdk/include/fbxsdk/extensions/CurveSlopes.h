@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // An extension of this platform, not part of the documented API, and not included by <fbxsdk.h>: how a curve really
-// goes through its keys. Keys hold slopes where somebody has set them; those of auto and TCB tangents follow from the
+// goes through its keys. Keys hold slopes where they were set; those of auto and TCB tangents follow from the
 // keys around.
 #pragma once
 

@@ -21,7 +21,7 @@ namespace extensions {
 [[nodiscard]] FBXSDK_DLL std::int64_t fileIdOf(const FbxObject& object);
 
 /// Whether the property says anything of its own: the file or its templates state it, it was set, or it is connected or
-/// animated. Otherwise it stands at the default of its class. False for an invalid property.
+/// animated. Otherwise it has the default of its class. False for an invalid property.
 [[nodiscard]] FBXSDK_DLL bool isStated(const FbxProperty& property);
 
 /// All objects of the scene, in the order of their entry: what GetSrcObject hands out one by one, in one walk.

@@ -42,9 +42,8 @@ struct RecordValue {
     double real = 0.0;        ///< of numbers with a fraction
     std::string_view text;    ///< of texts, bytes and words, as the file has them
 
-    // Of lists.
-    std::uint64_t count = 0;       ///< numbers
-    std::uint64_t storedBytes = 0; ///< that they take in the file
+    std::uint64_t count = 0;       ///< of a list: its numbers
+    std::uint64_t storedBytes = 0; ///< of a list: what it takes in the file
     /// How the numbers of a list are stored.
     enum EElement {
         eInt8,    ///< 8 bits
@@ -54,8 +53,8 @@ struct RecordValue {
         eFloat64, ///< double precision
         eWritten  ///< as digits, in an ASCII file
     };
-    EElement element = eFloat64; ///< eWritten: as digits, in an ASCII file
-    bool compressed = false;     ///< the list's bytes are deflated
+    EElement element = eFloat64; ///< of a list; eWritten: as digits, in an ASCII file
+    bool compressed = false;     ///< of a list: its bytes are deflated
 };
 
 /// A handle to one record; valid as long as its file. An empty one stands for "there is none".
@@ -74,7 +73,7 @@ public:
     [[nodiscard]] FileRecord firstChild() const;  ///< The first record of the block; empty when there is none.
     [[nodiscard]] FileRecord nextSibling() const; ///< The next record of the same block; empty after the last.
 
-    [[nodiscard]] std::size_t valueCount() const; ///< How many values stand before the block.
+    [[nodiscard]] std::size_t valueCount() const; ///< How many values precede the block.
     /// An integer 0 for an index out of range.
     [[nodiscard]] RecordValue value(std::size_t index) const;
     /// The first numbers of the record's list. False, and zeros, when there are fewer or the array is damaged.
