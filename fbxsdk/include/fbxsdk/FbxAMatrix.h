@@ -12,7 +12,8 @@ FBXSDK_NAMESPACE_BEGIN
 /// Rows 0, 1, 2 are the images of the x, y and z axes, row 3 is the translation, column 3 is (0, 0, 0, 1). Products and
 /// formulas read as with column vectors all the same: `(a * b).MultT(v) == a.MultT(b.MultT(v))`.
 ///
-/// Euler angles are in degrees and always of order XYZ. The w of vector arguments is ignored, that of results is 1.
+/// Euler angles are in degrees and always of order XYZ. The w of vector arguments is ignored, that of results is 1
+/// unless said otherwise.
 class FBXSDK_DLL FbxAMatrix : public FbxDouble4x4 {
 public:
     FbxAMatrix() { SetIdentity(); } ///< The identity.
@@ -57,7 +58,7 @@ public:
     /// The full product; the argument acts first.
     FbxAMatrix& operator*=(const FbxAMatrix& pOther) { return *this = *this * pOther; }
 
-    /// Scalars act on all sixteen elements; what comes of it is affine no more, unless the scalar is 1.
+    /// Scalars act on all sixteen elements; the result is no longer affine, unless the scalar is 1.
     FbxAMatrix operator*(double pValue) const;
     FbxAMatrix operator/(double pValue) const;                               ///< All sixteen divided.
     FbxAMatrix operator-() const { return *this * -1.0; }                    ///< All sixteen negated.

@@ -14,10 +14,10 @@ struct CurveCursor;
 struct CurveKeys;
 } // namespace detail
 
-/// How a key leads to the next one. The interpolation, tangents and weights of a piece of the curve are those of the
+/// How a key leads to the next one. The interpolation, tangents and weights of a segment of the curve are those of the
 /// key at its start.
 struct FBXSDK_DLL FbxAnimCurveDef {
-    /// Length of a tangent's handle, as a part of the piece of the curve.
+    /// Length of a tangent's handle, as a part of the segment.
     static constexpr float sDEFAULT_WEIGHT = 1.0F / 3.0F;
     static constexpr float sMIN_WEIGHT = 0.0001F;    ///< The shortest handle that applications offer.
     static constexpr float sMAX_WEIGHT = 0.99F;      ///< The longest handle that applications offer.
@@ -43,7 +43,7 @@ struct FBXSDK_DLL FbxAnimCurveDef {
         eInterpolationLinear = 0x00000004,   ///< a straight line
         eInterpolationCubic = 0x00000008     ///< a cubic with the slopes of both keys
     };
-    /// Which handles of a piece have a length of their own; the others have sDEFAULT_WEIGHT.
+    /// Which handles of a segment have a length of their own; the others have sDEFAULT_WEIGHT.
     enum EWeightedMode {
         eWeightedNone = 0x00000000,                       ///< none
         eWeightedRight = 0x01000000,                      ///< the one at the key
@@ -55,7 +55,7 @@ struct FBXSDK_DLL FbxAnimCurveDef {
         eConstantStandard = 0x00000000, ///< its own
         eConstantNext = 0x00000100      ///< the next key's
     };
-    /// Which sides of a piece have a velocity. Velocities are kept for files and do not change the curve.
+    /// Which sides of a segment have a velocity. Velocities are kept for files and do not change the curve.
     enum EVelocityMode {
         eVelocityNone = 0x00000000,                       ///< none
         eVelocityRight = 0x10000000,                      ///< the one at the key
@@ -75,8 +75,8 @@ struct FBXSDK_DLL FbxAnimCurveDef {
         eRightSlope = 0,       ///< value per second; of an auto tangent a bias in percent toward the key after it
         eNextLeftSlope = 1,    ///< value per second; of an auto tangent a bias in percent toward the key before it
         eWeights = 2,          ///< the first of the two weights
-        eRightWeight = 2,      ///< length of the handle, 0 to 1 of the piece
-        eNextLeftWeight = 3,   ///< length of the handle, 0 to 1 of the piece
+        eRightWeight = 2,      ///< length of the handle, 0 to 1 of the segment
+        eNextLeftWeight = 3,   ///< length of the handle, 0 to 1 of the segment
         eVelocity = 4,         ///< the first of the two velocities
         eRightVelocity = 4,    ///< kept, of no effect
         eNextLeftVelocity = 5, ///< kept, of no effect
@@ -99,7 +99,7 @@ public:
         eRepetition = 2,        ///< the keys over again
         eMirrorRepetition = 3,  ///< the keys over again, every other time backward
         eKeepSlope = 4,         ///< a straight line on
-        eRelativeRepetition = 5 ///< the keys over again, each time from where the curve has come to
+        eRelativeRepetition = 5 ///< the keys over again, each time from the last value
     };
 
     virtual void KeyClear() = 0;                       ///< Removes all keys; default value and extrapolation stay.
@@ -167,7 +167,7 @@ public:
     /// key has no tangents and holds its own value; KeySetConstantMode makes it hold the next one's.
     ///
     /// pData0 and pData1 are the right slope and the next key's left slope, in value per second, or tension and
-    /// continuity; weights are parts of the piece up to the next key.
+    /// continuity; weights are parts of the segment up to the next key.
     virtual void KeySet(int pKeyIndex, FbxTime pTime, float pValue,
                         FbxAnimCurveDef::EInterpolationType pInterpolation = FbxAnimCurveDef::eInterpolationCubic,
                         FbxAnimCurveDef::ETangentMode pTangentMode = FbxAnimCurveDef::eTangentAuto, float pData0 = 0.0F,

@@ -93,7 +93,7 @@ public:
     /// counts, or the relative one when that is empty.
     ///
     /// False for another format, for eMCOneFilePerFrame, for a rate that is not greater than zero, when the files
-    /// cannot be made, and while the cache is open. Why a file cannot be made is said without its name.
+    /// cannot be made, and while the cache is open. The status then does not contain the file's name.
     bool OpenFileForWrite(EMCFileCount pFileCount, double pSamplingFrameRate, const char* pChannelName,
                           EMCBinaryFormat pBinaryFormat, EMCDataType pMCDataType = eDoubleVectorArray,
                           const char* pInterpretation = "Points", FbxStatus* pStatus = nullptr);
@@ -106,8 +106,8 @@ public:
     /// The channel of exactly that name; -1 when there is none or the cache is not open.
     int GetChannelIndex(const char* pChannelName, FbxStatus* pStatus = nullptr);
     /// The sample of a Maya cache at the time, three numbers for each point: interpolated linearly between samples,
-    /// held outside the range. False for a bad channel, a damaged file and when the cache's point count differs; what
-    /// the buffer holds then is not said.
+    /// held outside the range. False for a bad channel, a damaged file and when the cache's point count differs; the
+    /// content of the buffer is unspecified then.
     bool Read(int pChannelIndex, FbxTime& pTime, double* pBuffer, unsigned int pPointCount,
               FbxStatus* pStatus = nullptr);
     /// The same in single precision.
@@ -136,9 +136,9 @@ public:
     unsigned int GetPointCount(FbxStatus* pStatus = nullptr);  ///< Of an open Max point cache; 0 otherwise.
     /// The frame of the first sample of an open Max point cache; 0 otherwise.
     double GetFrameStartOffset(FbxStatus* pStatus = nullptr);
-    /// The points of a Max point cache at the absolute frame number: between samples in a straight line, held outside
-    /// of them. A frame before zero is given as its 32 bits. False for any other cache, a damaged file and when the
-    /// point count differs.
+    /// The points of a Max point cache at the absolute frame number: interpolated linearly between samples, held
+    /// outside of them. A negative frame is passed converted to unsigned. False for any other cache, a damaged file and
+    /// when the point count differs.
     bool Read(unsigned int pFrameIndex, double* pBuffer, unsigned int pPointCount, FbxStatus* pStatus = nullptr);
     /// Writes the points of the absolute frame number; frames may come in any order. False outside the frames that were
     /// announced and on a write error.

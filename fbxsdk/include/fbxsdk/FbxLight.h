@@ -30,7 +30,7 @@ public:
     /// The surface of an area light.
     enum EAreaLightShape : int {
         eRectangle, ///< the default
-        eSphere     ///< a ball
+        eSphere     ///< a sphere
     };
 
     FbxPropertyT<EType> LightType;                ///< ePoint by default

@@ -24,7 +24,7 @@ public:
         eCube,       ///< the default
         eHardCross,  ///< a thick cross
         eLightCross, ///< a thin cross
-        eSphere,     ///< a ball
+        eSphere,     ///< a sphere
         eCapsule,    ///< a cylinder with round ends
         eBox,        ///< a flat box
         eBone,       ///< a bone

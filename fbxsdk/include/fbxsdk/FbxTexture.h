@@ -20,17 +20,17 @@ public:
         eStandard,               ///< a colour; the default
         eShadowMap,              ///< shadows
         eLightMap,               ///< light
-        eSphericalReflectionMap, ///< a reflected surrounding, by angles
-        eSphereReflectionMap,    ///< a reflected surrounding, as on a ball
+        eSphericalReflectionMap, ///< a reflected environment, by angles
+        eSphereReflectionMap,    ///< a reflected environment, as seen in a sphere
         eBumpNormalMap           ///< the direction of normals
     };
     /// How a surface gets its coordinates.
     enum EMappingType {
         eNull,        ///< not said
-        ePlanar,      ///< by a plane
-        eSpherical,   ///< by a ball
-        eCylindrical, ///< by a cylinder
-        eBox,         ///< by six planes
+        ePlanar,      ///< planar projection
+        eSpherical,   ///< spherical projection
+        eCylindrical, ///< cylindrical projection
+        eBox,         ///< projection from six planes
         eFace,        ///< each face by itself
         eUV,          ///< by the geometry's texture coordinates; the default
         eEnvironment  ///< by reflection

@@ -32,8 +32,8 @@ public:
         eFrames50,        ///< 50 frames per second
         eFrames48,        ///< 48 frames per second
         eFrames30,        ///< 30 frames per second
-        eFrames30Drop,    ///< 30 frames per second, shown as a time code that leaves numbers out
-        eNTSCDropFrame,   ///< 29.97002617 frames per second, shown as a time code that leaves numbers out
+        eFrames30Drop,    ///< 30 frames per second, shown as a drop-frame time code
+        eNTSCDropFrame,   ///< 29.97002617 frames per second, shown as a drop-frame time code
         eNTSCFullFrame,   ///< 29.97002617 frames per second
         ePAL,             ///< 25 frames per second
         eFrames24,        ///< 24 frames per second

@@ -15,8 +15,8 @@ namespace extensions {
 struct KeySlopes {
     double left = 0.0,       ///< per second
         right = 0.0;         ///< per second
-    double leftWeight = 0.0, ///< length of the handle, as a part of the piece before the key
-        rightWeight = 0.0;   ///< length of the handle, as a part of the piece behind it
+    double leftWeight = 0.0, ///< length of the handle, as a part of the segment before the key
+        rightWeight = 0.0;   ///< length of the handle, as a part of the segment after it
 };
 
 /// The slopes of the key of that index; zero for those that an end of the curve does not have.
