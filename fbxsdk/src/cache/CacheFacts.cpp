@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What point caches hold, also those that cannot be used: nothing here gives up at the first fault.
+// The content of point caches, damaged ones included: reading goes on after a fault.
 #include <fbxsdk/extensions/CacheFacts.h>
 
 #include <algorithm>
@@ -40,7 +40,7 @@ std::shared_ptr<const FileBytes> wholeFile(const std::string& name, FbxStatus& s
 constexpr std::string_view kMaxMagic("POINTCACHE2\0", 12);
 constexpr std::size_t kMaxHeaderBytes = 32;
 
-/// The first number that is none, as the offset of its bytes.
+/// The byte offset of the first number that is NaN or infinite.
 template <class Number>
 std::optional<std::size_t> firstNotFinite(std::span<const char> bytes, bool swap) {
     for (std::size_t at = 0; at + sizeof(Number) <= bytes.size(); at += sizeof(Number)) {
@@ -50,7 +50,7 @@ std::optional<std::size_t> firstNotFinite(std::span<const char> bytes, bool swap
     return {};
 }
 
-/// More are as many as nobody reads, and each may name a channel.
+/// A limit on the memory for fault texts, each of which may contain the name of a channel.
 constexpr std::size_t kMostFaults = 1000;
 
 /// Adds a fault unless there are enough; the last one says so.
@@ -61,7 +61,7 @@ void addFault(CacheFacts& facts, const std::string& file, std::uint64_t offset, 
     }
 }
 
-/// Names are as long as a file says.
+/// The length of a name is whatever the file says.
 std::string channelText(std::string_view name) {
     constexpr std::size_t kMostBytes = 200;
     const bool isWhole = name.size() <= kMostBytes;

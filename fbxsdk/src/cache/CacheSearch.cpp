@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Searching for cache files.
 #include "cache/CacheSearch.h"
 
 #include <algorithm>

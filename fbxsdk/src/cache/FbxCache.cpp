@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Point caches as objects of a scene: names, format, and the files behind them while they are open.
+// Point caches as objects of a scene: names, format, and the files while they are open.
 #include <fbxsdk/FbxCache.h>
 
 #include <algorithm>
@@ -24,7 +24,7 @@ FBXSDK_OBJECT_IMPLEMENT(FbxCache, FbxObject, detail::kCacheRows)
 
 namespace detail {
 
-/// What stands behind an open cache: exactly one of the four.
+/// The reader or writer of an open cache: exactly one of the four is set.
 class CacheFile {
 public:
     std::unique_ptr<MayaCacheReader> mayaReader;
@@ -43,7 +43,7 @@ public:
         return pointWriter ? &pointWriter->header() : nullptr;
     }
 
-    /// Puts what was written on the medium, under its name or, for the time being, under another.
+    /// Flushes what was written to the medium, under its final name or, when it waits for the scene, a temporary one.
     bool finish(bool waits, FbxStatus& status) {
         if (mayaWriter)
             return waits ? mayaWriter->complete(status) : mayaWriter->close(status);
@@ -63,7 +63,7 @@ public:
 
 namespace {
 
-/// A status that is always there, handed to the caller at the end when it wants one.
+/// A local status, copied to the optional status of the caller at the end of the scope.
 class Outcome {
 public:
     explicit Outcome(FbxStatus* target) : mTarget(target) {}
@@ -98,10 +98,10 @@ int roundedTicks(double perSecond) {
     return ticks >= 1.0 && ticks <= 1e9 ? static_cast<int>(ticks) : 1;
 }
 
-/// A frame before zero arrives wrapped around.
+/// Negative frame numbers are passed as unsigned ones; undoes the conversion.
 double frameOf(unsigned int index) { return static_cast<double>(static_cast<std::int32_t>(index)); }
 
-/// Where a cache is written: not searched for, unlike where it is read.
+/// The path to write to. Unlike the path to read from it is not searched for.
 std::string writtenName(const FbxCache& cache) {
     FbxString relative, absolute;
     cache.GetCacheFileName(relative, absolute);
@@ -186,7 +186,7 @@ bool FbxCache::OpenFileForRead(FbxStatus* pStatus) {
             outcome.status.Clear();
             return true;
         }
-        // A place that holds a damaged file says more than one that holds none, and the first more than the last.
+        // Damage is reported in preference to a missing file, and the first candidate in preference to later ones.
         const bool isDamage = status.GetCode() == FbxStatus::eInvalidFile;
         const bool knowsDamage = outcome.status.GetCode() == FbxStatus::eInvalidFile;
         if (!outcome.status.Error() || (isDamage && !knowsDamage))

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Maya caches in use: finding samples by time, and writing them one after another.
+// Reading samples of Maya caches by time, and appending samples.
 #include "cache/MayaCache.h"
 
 #include <algorithm>
@@ -21,8 +21,8 @@ namespace {
 
 namespace fs = std::filesystem;
 
-/// The names in a folder; none where it cannot be read. The standard library's iterator ends the process when it runs
-/// out of memory.
+/// The names in a folder; none when it cannot be read. Not std::filesystem's iterator, which terminates the process
+/// when memory runs out.
 class Folder {
 public:
     explicit Folder(const char* path) : mFolder(::opendir(path)) {
@@ -35,7 +35,7 @@ public:
         if (mFolder)
             ::closedir(mFolder);
     }
-    /// Null behind the last one.
+    /// Null after the last one.
     [[nodiscard]] const char* next() {
         const dirent* const entry = mFolder ? ::readdir(mFolder) : nullptr;
         return entry ? entry->d_name : nullptr;
@@ -131,7 +131,7 @@ void MayaCacheReader::openOneFile(const std::string& base, FbxStatus& status) {
     if (!mData)
         return;
     MayaCacheData data = parseMayaCacheData(mData->bytes(), mData.get());
-    // What is missing would read as the last sample that is there.
+    // Samples that are missing would be read as the last one that exists.
     if (data.end < mData->bytes().size()) {
         status.SetCode(FbxStatus::eInvalidFile, "%s: offset %zu: cut off or damaged", file.c_str(), data.end);
         return;
@@ -187,7 +187,7 @@ bool MayaCacheReader::read(const std::string& channel, double seconds, std::span
 
     const double span = static_cast<double>(after->first) - static_cast<double>(before->first);
     const double part = (ticks - static_cast<double>(before->first)) / span;
-    // Seconds come as floats: a time this close to a sample is that sample.
+    // Times come in single precision: within this tolerance of a sample they mean that sample.
     constexpr double kSameSample = 1e-3;
     if (part * span < kSameSample)
         return true;
@@ -226,7 +226,7 @@ std::unique_ptr<MayaCacheWriter> MayaCacheWriter::open(const std::string& descri
             return nullptr;
         }
     }
-    // Like other writers of one-file caches: the true range stands in the description.
+    // As other writers of one-file caches do: the actual range is in the description.
     writer->mData.write(mayaCacheHeader(description.wide, 0, 1));
     return writer;
 }

@@ -31,7 +31,8 @@ public:
     [[nodiscard]] static std::unique_ptr<MayaCacheReader> open(const std::string& descriptionFile, FbxStatus& status);
 
     [[nodiscard]] const MayaCacheDescription& description() const { return mDescription; }
-    /// The channel's points at a time in seconds, between two samples in a straight line, outside them the nearest one.
+    /// The channel's points at a time in seconds: interpolated linearly between samples, the nearest sample outside
+    /// them.
     [[nodiscard]] bool read(const std::string& channel, double seconds, std::span<double> points, FbxStatus& status);
     /// Times of the first and last sample in ticks. False when there is none.
     [[nodiscard]] bool sampleRange(std::int32_t& first, std::int32_t& last) const;
@@ -50,8 +51,8 @@ private:
     std::shared_ptr<const FileBytes> mData;  ///< of caches in one file
 };
 
-/// A cache in one file, of one or more channels. Its two files appear in close(), or never, or together with others
-/// after complete(). After a fault nothing more is written, and close() fails.
+/// A cache in one file, of one or more channels. Its two files get their final names in close(), or together with
+/// others after complete(), or are removed. After a fault nothing more is written, and close() fails.
 class MayaCacheWriter {
 public:
     [[nodiscard]] static std::unique_ptr<MayaCacheWriter> open(const std::string& descriptionFile,
@@ -66,9 +67,9 @@ public:
     [[nodiscard]] bool write(std::size_t channel, double seconds, std::span<const double> points, FbxStatus& status);
     /// Completes the data file and the description.
     [[nodiscard]] bool close(FbxStatus& status);
-    /// The same, but for their names.
+    /// The same, but the files keep their temporary names.
     [[nodiscard]] bool complete(FbxStatus& status);
-    /// In the order in which they should appear. The description is last: it is what readers open first.
+    /// In the order in which they should be renamed. The description is last, since readers open it first.
     [[nodiscard]] std::array<OutputFile*, 2> files() { return {&mData, &mText}; }
     [[nodiscard]] MayaCacheDescription& description() { return mDescription; }
 

@@ -31,7 +31,7 @@ struct Chunk {
     std::span<const char> payload;
 };
 
-/// Takes one chunk off the front. False at the end and at damage.
+/// Reads the next chunk and advances. False at the end of the data and for a damaged chunk.
 bool nextChunk(const Layout& layout, ReadAhead& ahead, std::span<const char>& rest, Chunk& chunk) {
     if (rest.size() < layout.headBytes)
         return false;
@@ -110,7 +110,7 @@ MayaCacheFrame parseFrame(const Layout& layout, ReadAhead& ahead, std::span<cons
             elements = loadNumber<std::uint32_t>(chunk.payload.data(), kSwap);
         } else if (const DataTag* data = dataTag(chunk.tag)) {
             const std::uint64_t elementBytes = static_cast<std::uint64_t>(data->components) * (data->doubles ? 8 : 4);
-            // The size chunk may lie; the bytes do not.
+            // The size chunk is not trusted; the size of the data counts.
             const std::uint64_t count = std::min<std::uint64_t>(elements, chunk.payload.size() / elementBytes);
             frame.blocks.push_back({channel, count, data->components, data->doubles, chunk.payload});
         }
@@ -186,7 +186,7 @@ bool readMayaCacheBlock(const MayaCacheBlock& block, std::span<double> destinati
     if (block.componentCount != 3 || block.elementCount * 3 != destination.size())
         return false;
     const char* from = block.bytes.data();
-    if (file) { // to the end of the destination, from where they are moved apart from the front on
+    if (file) { // read to the end of the destination, then widened in place from the front
         const std::size_t size = destination.size() * (block.doubles ? 8 : 4);
         char* const to = reinterpret_cast<char*>(destination.data()) + destination.size_bytes() - size;
         file->read(block.bytes.first(size), to);
@@ -200,7 +200,7 @@ bool readMayaCacheBlock(const MayaCacheBlock& block, std::span<double> destinati
 }
 
 const char* mayaCacheSampleFault(bool wide, std::uint64_t pointCount, bool doubles) {
-    // Not all readers take 32-bit sizes for unsigned ones.
+    // Some readers treat 32-bit sizes as signed.
     constexpr std::uint64_t kMost = INT32_MAX;
     // The chunks before the points, with the longest name there may be.
     constexpr std::uint64_t kOverhead = kMostMayaChannelName + 256;

@@ -23,7 +23,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Bytes of the longest name a channel can be written with; far longer than any name of an object.
+/// Bytes of the longest channel name that can be written; far longer than names of objects are.
 inline constexpr std::size_t kMostMayaChannelName = std::size_t{1} << 20;
 
 /// The numbers of one channel at one time.
@@ -46,7 +46,7 @@ struct MayaCacheFrame {
 
 struct MayaCacheData {
     std::vector<MayaCacheFrame> frames;
-    /// Where the file is cut off or damaged; behind its last byte when it is sound.
+    /// The offset at which the file is truncated or damaged; its size when it is sound.
     std::size_t end = 0;
 };
 /// Cuts a data file into its frames. Zeros behind the last one are no damage. Where the bytes are those of a file, they

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Cache descriptions by pugixml. Attribute order, quotes, unknown tags and entities are taken as they come.
+// Cache descriptions by pugixml. Any order of attributes and unknown tags are accepted.
 #include "cache/MayaCacheDescription.h"
 
 #include <algorithm>
@@ -20,7 +20,7 @@ namespace detail {
 namespace {
 
 constexpr const char* kRootTag = "Autodesk_Cache_File";
-/// A description has four levels; more than this is a trap for recursive code.
+/// A description has four levels; deeper nesting is refused, since the parser recurses.
 constexpr int kMaximumDepth = 32;
 /// Descriptions are a few kilobytes.
 constexpr std::size_t kMaximumBytes = std::size_t{16} << 20U;
@@ -67,7 +67,7 @@ bool isChannelTag(const char* name) {
     return std::strncmp(name, kPrefix, length) == 0 && name[length] >= '0' && name[length] <= '9';
 }
 
-// The XML library has its own memory, and leaves out silently what it has none for.
+// pugixml allocates by itself, and silently omits nodes when an allocation fails.
 
 pugi::xml_node append(pugi::xml_node parent, pugi::xml_node_type type, const char* name) {
     pugi::xml_node node = parent.append_child(type);

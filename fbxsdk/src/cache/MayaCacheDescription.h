@@ -40,7 +40,7 @@ struct MayaCacheDescription {
 /// False when the file is missing, is no XML, nests too deeply or is no cache description.
 [[nodiscard]] bool readMayaCacheDescription(const std::string& fileName, MayaCacheDescription& description,
                                             FbxStatus& status);
-/// What stands in the file.
+/// The text of the description file.
 [[nodiscard]] std::string mayaCacheDescriptionText(const MayaCacheDescription& description);
 
 } // namespace detail

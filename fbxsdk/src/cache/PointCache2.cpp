@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Max point caches.
 #include "cache/PointCache2.h"
 
 #include <algorithm>
@@ -32,11 +30,11 @@ void storeNumber(char* bytes, Number number) {
     std::memcpy(bytes, &ordered, sizeof ordered);
 }
 
-/// Some writers put a rate in frames per second where frames per sample belong: more than one frame per sample is
-/// unheard of, a rate at or below one is.
+/// Some writers store frames per second in the field of frames per sample. Values above 1 are taken for such a rate:
+/// more than one frame per sample does not occur, nor does a rate of 1 or less.
 double framesPerSample(float stored) { return stored > 0.0F && stored <= 1.0F ? static_cast<double>(stored) : 1.0; }
 
-/// Null, or what cannot stand in a header.
+/// Null, or what the header cannot hold.
 const char* headerFault(const PointCacheHeader& header) {
     constexpr std::uint64_t kMostCount = INT32_MAX, kMostBytes = INT64_MAX;
     constexpr double kMostFrame = INT32_MAX;
@@ -84,7 +82,7 @@ std::unique_ptr<PointCacheReader> PointCacheReader::open(const std::string& file
     return reader;
 }
 
-/// Floats are read to the end of the points and moved apart from the front on.
+/// Floats are read to the end of the destination, then widened in place from the front.
 void PointCacheReader::readSample(std::uint64_t sample, std::span<double> points) const {
     char* const floats = reinterpret_cast<char*>(points.data()) + points.size() * (sizeof(double) - sizeof(float));
     mFile->read(mFile->bytes().subspan(kHeaderBytes + sample * sampleBytes(mHeader), points.size() * sizeof(float)),
@@ -170,7 +168,7 @@ void PointCacheWriter::put(std::uint64_t offset, std::span<const double> points)
         for (std::size_t i = 0; i < piece.size(); ++i)
             storeNumber(bytes.data() + i * sizeof(float), static_cast<float>(piece[i]));
         const std::span<const char> stored(bytes.data(), piece.size() * sizeof(float));
-        // A sample is either all behind what is written or all within.
+        // A sample is either completely beyond the end of the file so far or completely before it.
         if (offset < mFile.size()) {
             mFile.overwrite(offset, stored);
         } else {

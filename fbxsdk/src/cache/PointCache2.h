@@ -28,8 +28,8 @@ class PointCacheReader {
 public:
     [[nodiscard]] static std::unique_ptr<PointCacheReader> open(const std::string& fileName, FbxStatus& status);
     [[nodiscard]] const PointCacheHeader& header() const { return mHeader; }
-    /// The points at a frame, between samples in a straight line, outside them the nearest one. False when the cache
-    /// has another number of points. Throws FileFault.
+    /// The points at a frame: interpolated linearly between samples, the nearest sample outside them. False when the
+    /// cache has another number of points. Throws FileFault.
     [[nodiscard]] bool read(double frame, std::span<double> points) const;
 
 private:
@@ -39,8 +39,8 @@ private:
     PointCacheHeader mHeader;
 };
 
-/// The file appears in close(), or never, or together with others after complete(). After a fault nothing more is
-/// written, and close() fails.
+/// The file gets its final name in close(), or together with others after complete(), or is removed. After a fault
+/// nothing more is written, and close() fails.
 class PointCacheWriter {
 public:
     [[nodiscard]] static std::unique_ptr<PointCacheWriter> open(const std::string& fileName,
@@ -52,7 +52,7 @@ public:
     [[nodiscard]] bool write(double frame, const double* points, FbxStatus& status);
     /// Fills up missing samples at the end, so that the file has the size that its header promises.
     [[nodiscard]] bool close(FbxStatus& status);
-    /// The same, but for its name.
+    /// The same, but the file keeps its temporary name.
     [[nodiscard]] bool complete(FbxStatus& status);
     [[nodiscard]] OutputFile& file() { return mFile; }
     [[nodiscard]] const PointCacheHeader& header() const { return mHeader; }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Whether numbers can stand in a point cache.
+// Validation of numbers before they are written to a point cache.
 #pragma once
 
 #include <cmath>
@@ -13,8 +13,8 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Null, or why the points of a sample cannot be written, as floats or as they are. What is no number would spread in
-/// every program that reads the cache.
+/// Null, or why the points of a sample cannot be written, in single or double precision. NaN and infinity are refused:
+/// they would spread in every program that reads the cache.
 [[nodiscard]] inline const char* sampleFault(std::span<const double> points, bool asFloats) {
     constexpr auto kMostFloat = static_cast<double>(std::numeric_limits<float>::max());
     for (const double value : points) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A property's value and its animation change together, or samples and static values disagree.
+// A property's static value and its curves are converted together, so that they agree afterwards.
 #include "conversion/AnimatedValues.h"
 
 #include <fbxsdk/FbxAnimCurve.h>
@@ -16,8 +16,8 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Whether the curve stands in more than one channel, over all curve nodes. Thousands may share one curve: the answer
-/// is known after the first two.
+/// Whether the curve drives more than one channel, over all curve nodes. Thousands may share one curve: the search ends
+/// at the second.
 bool isShared(const FbxAnimCurve& curve) {
     int uses = 0;
     for (const ConnectionPoint* point : curve.data().plug.destinations) {

@@ -49,8 +49,8 @@ SignedAxis crossed(const SignedAxis& up, const SignedAxis& front) {
     return {3 - up.index - front.index, up.sign * front.sign * (cyclic ? 1 : -1)};
 }
 
-/// The proper rotation that carries the source's up and front onto the target's. A difference in handedness is left
-/// alone: it would take a mirror, which only a deep conversion may apply.
+/// The proper rotation that maps the source's up and front to the target's. A difference in handedness is ignored: it
+/// would need a reflection, which only a conversion of all geometry can apply.
 SignedPermutation turnBetween(const FbxAxisSystem& source, const FbxAxisSystem& target) {
     const std::array<SignedAxis, 2> from = {upAxis(source), frontAxis(source)};
     const std::array<SignedAxis, 2> to = {upAxis(target), frontAxis(target)};
@@ -136,7 +136,7 @@ void turnTranslationLimits(FbxNode& node, const SignedPermutation& turn) {
     writeBound(node, "TranslationMax", turned[1]);
 }
 
-/// M T Roff Rp … becomes T' Roff' Rp M …: the rotation offset takes up what the pivot would move.
+/// M T Roff Rp … becomes T' Roff' Rp M …: the rotation offset compensates for the pivot.
 void turnNode(FbxNode& node, const SignedPermutation& turn) {
     constexpr auto kSet = FbxNode::eSourcePivot;
     detail::permuteAnimated(node.LclTranslation, turn);

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// All three matrices of a cluster change together: in the skinning formula they meet as inverse(link) times mesh, where
-// the common factor cancels.
+// All three matrices of a cluster are transformed: the skinning formula contains inverse(link) times mesh, in which the
+// common factor cancels.
 #include "conversion/ClusterBinding.h"
 
 #include <fbxsdk/FbxCluster.h>

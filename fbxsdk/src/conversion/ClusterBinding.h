@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Bind matrices follow the scene when it is moved as a whole.
+// Bind matrices when a whole scene is transformed.
 #pragma once
 
 #include <fbxsdk/FbxAMatrix.h>

@@ -23,7 +23,7 @@ namespace {
 
 using detail::scaleAnimated;
 
-/// A unit that is none gives no factor that a scene could be multiplied by.
+/// Whether a scene can be multiplied by the factor; not so when one of the units is invalid.
 bool isFactor(double k) { return k > 0.0 && std::isfinite(k); }
 
 FbxVector4 multiplied(const FbxVector4& vector, double factor) {
@@ -41,7 +41,7 @@ bool carriesFactor(const FbxAnimLayer* layer) {
     return base || !additive || layer->ScaleAccumulationMode.Get() != FbxAnimLayer::eScaleMultiply;
 }
 
-/// Scaling S becomes k S. The scaling offset takes up what the pivot would move: k Soff + (k - 1) Sp.
+/// Scaling S becomes k S. The scaling offset compensates for the pivot: k Soff + (k - 1) Sp.
 void scaleFirstLevel(FbxNode& node, double k) {
     constexpr auto kSet = FbxNode::eSourcePivot;
     scaleAnimated(node.LclTranslation, k);
@@ -61,9 +61,9 @@ bool ignoresParentScale(const FbxNode& node) {
     return inherit == FbxTransform::eInheritRrs;
 }
 
-/// A node that leaves its parent's scaling out would lose the factor with it, so it is scaled itself. Its position,
-/// which lies in the parent's space, has the factor already: the pivot shrinks by as much as the scaling grows, so that
-/// S Sp stays at every time, and the offset makes up for the pivot.
+/// A node that does not inherit its parent's scaling would not inherit the factor either, so it is scaled itself. Its
+/// position, which is in the parent's space, has the factor already: the pivot is divided by the factor, so that S Sp
+/// stays the same at every time, and the offset compensates for the pivot.
 void scaleIndependent(FbxNode& node, double k) {
     constexpr auto kSet = FbxNode::eSourcePivot;
     FbxVector4 offset = node.GetScalingOffset(kSet);
@@ -75,7 +75,7 @@ void scaleIndependent(FbxNode& node, double k) {
     scaleAnimated(node.LclScaling, k, carriesFactor);
 }
 
-/// Where a converted parent has children that leave its scaling out, they are converted, and theirs likewise.
+/// The children of converted nodes that do not inherit their scaling, and in turn those of these.
 std::vector<FbxNode*> independentBelow(FbxNode& root) {
     std::vector<FbxNode*> converted;
     converted.reserve(static_cast<std::size_t>(root.GetChildCount()));

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Curves and curve nodes for properties of a scene.
 #include <string_view>
 
 #include <fbxsdk/FbxAnimCurve.h>
@@ -73,7 +71,7 @@ FbxAnimCurveNode* FbxAnimCurveNode::CreateTypedCurveNode(FbxProperty& pProperty,
 FbxAnimCurveNode* FbxAnimLayer::CreateCurveNode(FbxProperty& pProperty) {
     if (FbxAnimCurveNode* existing = pProperty.GetCurveNode(this, false))
         return existing;
-    // What a host keys is kept, whatever the flags say: films and planes of cameras are not marked as animatable.
+    // Whatever the flags say: hosts key the film and the planes of cameras, which are not marked as animatable.
     FbxAnimCurveNode* node = FbxAnimCurveNode::CreateTypedCurveNode(pProperty, GetScene());
     if (!node)
         return nullptr;

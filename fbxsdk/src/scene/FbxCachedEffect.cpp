@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Cached effects.
 #include <fbxsdk/FbxCachedEffect.h>
 
 #include "object/ManagerData.h"

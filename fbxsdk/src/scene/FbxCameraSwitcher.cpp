@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The camera switcher.
 #include <fbxsdk/FbxCameraSwitcher.h>
 
 #include "object/ManagerData.h"

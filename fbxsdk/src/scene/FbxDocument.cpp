@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What documents have beside their members: the name of the active stack.
+// Documents: a collection with the name of the active stack.
 #include <fbxsdk/FbxDocument.h>
 
 #include "object/ManagerData.h"

@@ -1,7 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Ambient light and fog. The ambient colour stands in the global settings; the rest only files before 7.x can hold.
+// Ambient light and fog. The ambient colour is kept in the global settings; the rest can be stored in files before 7.x
+// only.
 #include <fbxsdk/FbxGlobalLightSettings.h>
 
 #include <fbxsdk/FbxScene.h>

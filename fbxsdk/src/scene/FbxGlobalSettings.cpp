@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Settings of a whole scene, kept as the properties that files have for them.
+// Settings of a whole scene, stored as properties under the names that files have.
 #include <fbxsdk/FbxGlobalSettings.h>
 
 #include "object/ManagerData.h"
@@ -24,7 +24,7 @@ void store(FbxGlobalSettings& settings, const char* name, const T& value) {
     settings.FindProperty(name).Set(value);
 }
 
-/// A file may say anything; what is no unit counts as centimetres.
+/// Numbers of files that are no unit count as centimetres.
 FbxSystemUnit unitOf(const FbxGlobalSettings& settings, const char* name) {
     const auto scale = settings.FindProperty(name).Get<FbxDouble>();
     constexpr double kLargest = 1e12;

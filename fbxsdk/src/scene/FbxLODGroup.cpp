@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Groups of levels of detail.
 #include <fbxsdk/FbxLODGroup.h>
 
 #include "object/ManagerData.h"

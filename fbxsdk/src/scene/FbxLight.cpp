@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Lights.
 #include <fbxsdk/FbxLight.h>
 
 #include "object/ManagerData.h"

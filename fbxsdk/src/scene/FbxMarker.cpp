@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Markers.
 #include <fbxsdk/FbxMarker.h>
 
 #include "object/ManagerData.h"

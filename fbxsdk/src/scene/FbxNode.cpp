@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Nodes: hierarchy, attributes, targets and materials. What a node has is said by its connections; the vectors here
-// follow them, so that asking for the thousandth child costs no search.
+// Nodes: hierarchy, attributes, targets and materials. Connections are authoritative; the vectors cache them, so that
+// access by index needs no search.
 #include <fbxsdk/FbxNode.h>
 
 #include <algorithm>
@@ -27,7 +27,7 @@ FBXSDK_OBJECT_IMPLEMENT(FbxNode, FbxObject, detail::kNodeRows)
 
 namespace {
 
-/// Places of rows that every node is asked for, looked up once.
+/// Indices of frequently used rows, looked up once.
 struct NodeRows {
     int translation = detail::rowIndex(detail::kNodeRows, "Lcl Translation");
     int rotation = detail::rowIndex(detail::kNodeRows, "Lcl Rotation");
@@ -52,14 +52,14 @@ T* at(const std::vector<T*>& objects, int index) {
     return index >= 0 && place < objects.size() ? objects[place] : nullptr;
 }
 
-/// -1 when it is not among them.
+/// -1 when it is not in the list.
 template <class T>
 int indexIn(const std::vector<T*>& objects, const T* object) {
     const auto found = std::find(objects.begin(), objects.end(), object);
     return found == objects.end() ? -1 : static_cast<int>(found - objects.begin());
 }
 
-/// Takes the object out. What was connected last mostly goes first, so the search starts at the end.
+/// Removes the object. Connections are mostly cut in reverse order, so the search starts at the end.
 template <class T>
 void takeOut(std::vector<T*>& objects, const T* object) {
     const auto found = std::find(objects.rbegin(), objects.rend(), object);
@@ -108,7 +108,7 @@ detail::NodeEvaluation& FbxNode::evaluation() {
 }
 
 void FbxNode::connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) {
-    // Both ends are told; the node that gains or loses a source acts for both.
+    // Both ends are notified; the destination updates the lists of both.
     if (&pDestination != this)
         return;
     if (auto* child = FbxCast<FbxNode>(&pSource)) {

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Nulls.
 #include <fbxsdk/FbxNull.h>
 
 #include "object/ManagerData.h"

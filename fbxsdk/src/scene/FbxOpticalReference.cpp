@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Optical references.
 #include <fbxsdk/FbxOpticalReference.h>
 
 #include "object/ManagerData.h"

@@ -61,7 +61,7 @@ namespace detail {
 
 namespace {
 
-/// Adds the object to the list, or takes it away, when it is a T.
+/// Adds the object to the list, or removes it, when it is a T.
 template <class T>
 void keepInList(std::vector<T*>& members, FbxObject& object, bool isMember) {
     T* member = FbxCast<T>(&object);
@@ -70,7 +70,7 @@ void keepInList(std::vector<T*>& members, FbxObject& object, bool isMember) {
     if (isMember) {
         members.push_back(member);
     } else {
-        // What came last mostly goes first: search from the back.
+        // Members mostly leave in reverse order: search from the end.
         const auto place = std::find(members.rbegin(), members.rend(), member);
         members.erase(std::next(place).base());
     }

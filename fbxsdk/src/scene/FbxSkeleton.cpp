@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Bones.
 #include <fbxsdk/FbxSkeleton.h>
 
 #include "object/ManagerData.h"

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Materials: members bound to their properties, and nothing else.
+// Materials: members bound to their properties.
 #include <fbxsdk/FbxSurfaceMaterial.h>
 
 #include "object/ManagerData.h"

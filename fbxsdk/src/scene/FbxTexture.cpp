@@ -17,8 +17,8 @@ FBXSDK_OBJECT_IMPLEMENT(FbxLayeredTexture, FbxTexture, detail::kLayeredTextureRo
 
 namespace {
 
-/// The file's number of a mapping type and the other way round: UV (6) and none (0) change places. Only UV's is known
-/// from files; the rest keep the order of the enumerators.
+/// Converts a mapping type to its number in files, and back: UV (6) and none (0) are exchanged. Only the number of UV
+/// is known from files; the others keep those of the enumerators.
 constexpr FbxEnum exchangedMapping(FbxEnum number) {
     if (number == FbxTexture::eUV)
         return FbxTexture::eNull;

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Clips: two file names.
 #include <fbxsdk/FbxVideo.h>
 
 #include "object/ManagerData.h"

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// What files say of objects beyond what they are.
 #include <fbxsdk/extensions/FileFacts.h>
 
 #include "object/ObjectData.h"

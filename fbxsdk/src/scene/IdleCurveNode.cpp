@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Layers above the base add what their curve nodes hold, with keys or without: those are never idle.
+// Layers above the base layer contribute the values of their curve nodes even without keys: those are never idle.
 #include "scene/IdleCurveNode.h"
 
 #include <algorithm>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Times that only the keys of a file tell.
+// Times that are derived from the keys of a file.
 #include "scene/MissingTimes.h"
 
 #include <algorithm>
@@ -72,7 +72,7 @@ void fillSpan(const Document& document, const DocumentObject& source, FbxAnimSta
     }
 }
 
-/// The document's stacks with what the file says of them, in the order of the file.
+/// The document's stacks with their objects in the file, in the order of the file.
 template <class Visit>
 void eachStack(const Document& document, const std::vector<FbxObject*>& objects, Visit&& visit) {
     for (std::size_t i = 0; i < document.objects.size(); ++i) {
@@ -86,7 +86,7 @@ void sortOut(std::vector<std::int64_t>& times) {
     times.erase(std::unique(times.begin(), times.end()), times.end());
 }
 
-/// The times of all keys; without any, the ends of the stack.
+/// The times of all keys; without keys, start and stop of the stack.
 std::vector<std::int64_t> timesOf(const FbxAnimStack& stack) {
     std::vector<std::int64_t> times;
     std::size_t sorted = 0;

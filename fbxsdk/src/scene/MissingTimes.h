@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a file leaves out about its times: the spans of its stacks, and the rate of a custom time mode.
+// Defaults for times that a file does not state: the spans of its stacks, and the rate of a custom time mode.
 #pragma once
 
 #include <string>
@@ -13,13 +13,13 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Gives every stack of the document that states no span that of its keys; without keys its reference span, and
-/// without that the span of the scene, if the file states one. `objects` are the scene's by their place in
-/// Document::objects.
+/// Sets the span of every stack of the document that states none to that of its keys; without keys to its reference
+/// span, and without that to the span of the scene, if the file states one. `objects` are the scene's objects, by their
+/// index in Document::objects.
 void fillStackSpans(const Document& document, const std::vector<FbxObject*>& objects, FbxScene& scene);
 
-/// Gives a scene of the custom time mode, when the document states no rate for it, the one that the keys of its first
-/// stack tell, or else the span of that stack. A sentence about it; empty when there was nothing to do.
+/// Sets the rate of a scene with the custom time mode, when the document states none, to one that fits the keys of its
+/// first stack, or else the span of that stack. Returns a warning; empty when there was nothing to do.
 [[nodiscard]] std::string fillFrameRate(const Document& document, const std::vector<FbxObject*>& objects,
                                         FbxScene& scene);
 

@@ -3,10 +3,10 @@
 //
 // Evaluation of node transforms.
 //
-// Hosts read one node after another, each over many times. So every moving node with children keeps its global
-// transforms by time: a node then costs one local matrix and one product per time, however deep it hangs. What nothing
-// moves has one transform. The caches of a manager are bounded together; when they are full the node that was not asked
-// for longest loses its own.
+// Hosts read one node after another, each over many times. So every animated node with children caches its global
+// transforms by time: a node then costs one local matrix and one product per time, whatever its depth. A node that is
+// static, with all of its ancestors, has one transform. The caches of a manager share one bound; beyond it the cache of
+// the least recently used node is released.
 #include "scene/NodeEvaluation.h"
 
 #include <algorithm>
@@ -23,7 +23,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// The parts of a moving node's transform that do not change with time, and the three properties that may.
+/// The parts of an animated node's transform that are constant, and the three properties that may be animated.
 struct TransformBinding {
     AnimatedProperty translation, rotation, scaling;
     Linear preRotation, postRotationInverse;
@@ -89,7 +89,7 @@ void write(FbxAMatrix& matrix, const Linear& linear, const Vector3& translation)
     }
 }
 
-// ---- Binding: what is known of a node before it is asked for a time ----
+// ---- Binding: what does not depend on the time ----
 
 bool isZero(const FbxVector4& vector) { return vector[0] == 0.0 && vector[1] == 0.0 && vector[2] == 0.0; }
 
@@ -159,7 +159,7 @@ EvaluationBudget& evaluationBudgetOf(ManagerData& manager) {
 
 namespace {
 
-/// The node's evaluation state, emptied when the scene has changed since it was filled.
+/// The node's evaluation state, cleared when the scene has changed since it was filled.
 NodeEvaluation& currentState(FbxNode& node) {
     NodeEvaluation& state = node.evaluation();
     ManagerData& manager = node.GetFbxManager()->data();
@@ -202,7 +202,7 @@ Linear linearPart(const GlobalTransform& parent, const LocalTransform& local, co
     case FbxTransform::eInheritRrSs:
         break;
     }
-    // The scale and shear that the parent hands on: its matrix with its pure rotation taken off.
+    // The scale and shear that the child inherits: the parent's matrix without its pure rotation.
     const Linear scale = transposed(parent.rotation) * parent.matrix;
     return rotation * scaled(scale, local.scaling);
 }
@@ -216,8 +216,8 @@ GlobalTransform combine(const GlobalTransform* parent, const LocalTransform& loc
             imageOf(parent->matrix, parent->translation, local.translation), rotation, local.scaling};
 }
 
-/// Finds out for the node and its ancestors which of them nothing animates, themselves or above: those have one
-/// transform for every time.
+/// Determines for the node and its ancestors which are static together with all nodes above them: those have one
+/// transform for all times.
 NodeEvaluation& stateWithChain(FbxNode& node) {
     NodeEvaluation& asked = currentState(node);
     if (asked.chain != NodeEvaluation::Chain::unknown)
@@ -240,12 +240,12 @@ NodeEvaluation& stateWithChain(FbxNode& node) {
     return asked;
 }
 
-/// Where a way up through the tree ends: at a node that knows its transform, or above the root.
+/// The node's cached transform at the time of that number; null when it is not cached.
 const GlobalTransform* knownTransform(NodeEvaluation& state, EvaluationBudget& budget, std::uint64_t number) {
     return state.hasStillGlobal ? &state.stillGlobal : budget.find(state, number);
 }
 
-/// Up to the nearest ancestor that knows the answer, then down again. Of nodes that stand still the answer holds for
+/// Goes up to the nearest ancestor with a cached transform and down again. The transform of a static node is cached for
 /// all times.
 GlobalTransform globalAt(FbxNode& node, const FbxTime& time) {
     EvaluationBudget& budget = evaluationBudgetOf(node.GetFbxManager()->data());

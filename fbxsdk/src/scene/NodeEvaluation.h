@@ -28,14 +28,14 @@ using Vector3 = std::array<double, 3>;
 /// The images of the three axes, as the first rows of an FbxAMatrix hold them.
 using Linear = std::array<Vector3, 3>;
 
-/// A node's own transform at one time, taken apart.
+/// A node's local transform at one time, decomposed.
 struct LocalTransform {
     Linear rotation;     ///< Rpre R Rpost⁻¹
     Vector3 translation; ///< the translation column of the local matrix, pivots included
     Vector3 scaling;
 };
 
-/// What a node's global transform hands on to its children.
+/// What the children of a node inherit from its global transform.
 struct GlobalTransform {
     Linear matrix;
     Vector3 translation;
@@ -45,16 +45,16 @@ struct GlobalTransform {
 
 /// Global transforms of one node by the numbers of their times (see TimeNumbers).
 ///
-/// A number has one place. When another one stands there that can still be asked for and was not found yet, the list
-/// grows; any other gives way. So a host that asks node after node for all times finds all of them, and one that takes
-/// the times in portions needs room for a portion only.
+/// A direct-mapped table that is indexed by the low bits of the number. An entry that is still needed (recent, and not
+/// yet found) makes the table grow on a collision; any other is overwritten. So a host that evaluates node after node
+/// at all times finds all of them, and one that takes the times in portions needs memory for a portion only.
 class TransformCache {
 public:
     [[nodiscard]] const GlobalTransform* find(std::uint64_t number);
     /// `newest` is the number that was given last; those too far behind are forgotten.
     void store(std::uint64_t number, const GlobalTransform& transform, std::uint64_t newest);
-    /// Forgets everything and takes over the memory of another cache. `generation` was given to none of the caches that
-    /// the memory belonged to.
+    /// Clears the cache and takes over the memory of another one. `generation` must differ from those of all caches
+    /// that the memory belonged to, so that their entries are invalid.
     void reset(TransformCache&& memory, std::uint32_t generation);
     [[nodiscard]] std::size_t places() const { return mEntries.size(); }
     [[nodiscard]] std::size_t used() const { return mUsed; } ///< places that hold a transform
@@ -95,7 +95,7 @@ struct NodeEvaluation {
     GlobalTransform stillGlobal{}; ///< of a node that is static, and so are its ancestors
 
     TransformCache cache; ///< of a node that has children and moves
-    // The list of nodes whose cache holds something, from the one asked last on.
+    // Links of the list of nodes with a cache, most recently used first.
     NodeEvaluation* nextUsed = nullptr;
     NodeEvaluation* previousUsed = nullptr;
 };
@@ -107,7 +107,7 @@ public:
     static constexpr std::size_t kMostPlaces = std::size_t{1} << 16U;
 
     TimeNumbers times;
-    std::vector<FbxNode*> path; ///< of one evaluation; here to keep its memory
+    std::vector<FbxNode*> path; ///< of one evaluation; a member to reuse its memory
 
     [[nodiscard]] const GlobalTransform* find(NodeEvaluation& evaluation, std::uint64_t number);
     void store(NodeEvaluation& evaluation, std::uint64_t number, const GlobalTransform& transform);
@@ -122,7 +122,7 @@ private:
     NodeEvaluation* mOldest = nullptr;
     std::size_t mPlaces = 0;
     std::uint32_t mGeneration = 0; ///< that was given last
-    TransformCache mSpare;         ///< of the node that was released last, for the next one: most need as much memory
+    TransformCache mSpare;         ///< of the node that was released last, reused by the next one
 };
 
 /// Made when a manager's first node is evaluated.

@@ -47,7 +47,7 @@ const PivotRows& pivotRows() {
 
 FbxProperty propertyOf(const FbxNode& node, int row) { return {const_cast<FbxNode*>(&node), row}; }
 
-/// The number of a file as an enumerator: 0 to `last`, anything else counts as 0.
+/// A number from a file as an enumerator: numbers outside 0 to `last` count as 0.
 template <class Enum>
 Enum enumeratorOf(const FbxProperty& property, Enum last) {
     const FbxEnum number = property.Get<FbxEnum>();
@@ -76,7 +76,7 @@ const FbxVector4& FbxNode::pivotVector(EPivotSet set, detail::PivotVector which)
         const bool stored = mPivots && mPivots->destination;
         return (stored ? *mPivots->destination : defaults).vectors[place];
     }
-    // Most nodes have most vectors at their defaults; those need no memory.
+    // Vectors with their default values, which are most, need no memory.
     const int row = pivotRows().vectors[place];
     if (!data().property(row))
         return defaults.vectors[place];

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a node keeps of its pivots beside its properties.
+// The pivot data of a node that is not stored in its properties.
 #pragma once
 
 #include <array>
@@ -29,7 +29,7 @@ enum class PivotVector : unsigned char {
 
 using PivotVectors = std::array<FbxVector4, static_cast<std::size_t>(PivotVector::count)>;
 
-/// A pivot set that files have no place for.
+/// A pivot set that is kept in memory only.
 struct DestinationPivots {
     DestinationPivots();
 

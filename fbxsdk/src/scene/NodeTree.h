@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Walking a tree of nodes without recursion: files may be deeper than any stack.
+// Traversal of node trees without recursion: the depth of a file is not bounded by the call stack.
 #pragma once
 
 #include <utility>

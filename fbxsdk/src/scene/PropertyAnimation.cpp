@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The curves of a property: found, and made on demand, through the curve node that a layer holds for it.
+// The curves of a property, found and created through the curve node that a layer has for it.
 #include <cstring>
 
 #include <fbxsdk/FbxAnimCurve.h>
@@ -40,7 +40,7 @@ int channelOf(const FbxAnimCurveNode& node, const char* channel) {
     return -1;
 }
 
-/// The order in which layers compose the object's rotations; what is no node has none of its own.
+/// The order in which layers compose the object's rotations; XYZ for objects that are no nodes.
 FbxEuler::EOrder orderInForce(FbxObject& object) {
     FbxEuler::EOrder order = FbxEuler::eOrderXYZ;
     const auto* node = FbxCast<FbxNode>(&object);

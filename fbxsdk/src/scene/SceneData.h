@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a scene keeps beside its members.
+// The data of a scene: its settings, lists of members by class, and the files it was read from.
 #pragma once
 
 #include <memory>
@@ -30,7 +30,7 @@ struct SceneData final : Membership {
     FbxAnimStack* currentStack = nullptr;
     std::vector<FbxNode*> nodes;       ///< in order of entry
     std::vector<FbxAnimStack*> stacks; ///< likewise
-    /// How many samples surfaces that became meshes have beyond what their control points are good for.
+    /// How many samples tessellated surfaces have beyond the allowance of their control points.
     std::int64_t samplesUsed = 0;
     /// The files that were read into the scene; geometry is read from them on first use.
     std::vector<std::shared_ptr<const Document>> documents;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Numbers for the times that evaluation is asked for.
+// Consecutive numbers for the times at which transforms are evaluated.
 #pragma once
 
 #include <cstdint>
@@ -13,11 +13,11 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Gives every time a number, in the order in which they are asked for first, and remembers the latest ones. A time
-/// that was forgotten gets a new number.
+/// Assigns every time a number, in the order of first use, and remembers the latest ones. A time that was dropped gets
+/// a new number.
 ///
-/// Whoever keeps something by time can keep it by number instead, in a list: node after node is asked for the same
-/// times, forwards, backwards or in no order at all, and the numbers go up by one each time all the same.
+/// Caches by time are indexed by these numbers: nodes are evaluated at the same times one after another, in any order,
+/// and the numbers are consecutive all the same.
 class TimeNumbers {
 public:
     static constexpr std::size_t kKept = std::size_t{1} << 15U;
