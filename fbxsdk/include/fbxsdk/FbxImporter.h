@@ -26,7 +26,7 @@ public:
 };
 
 /// Reads a file into a scene: Initialize opens it, Import brings its content in. FBX is the only format, binary and
-/// ASCII, from 5.x to 7.7.
+/// ASCII, versions 3000 to 7999.
 class FBXSDK_DLL FbxImporter : public FbxIOBase {
     FBXSDK_OBJECT_DECLARE(FbxImporter, FbxIOBase)
 
