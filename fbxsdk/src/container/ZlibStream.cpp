@@ -24,14 +24,28 @@ constexpr std::size_t kMostKeptBytes = std::size_t{1} << 18;
 
 } // namespace
 
-bool inflateExactly(std::span<const char> stream, std::span<char> destination) {
-    const std::unique_ptr<libdeflate_decompressor, decltype(&libdeflate_free_decompressor)> decompressor(
-        libdeflate_alloc_decompressor(), &libdeflate_free_decompressor);
+namespace {
+
+using Decompressor = std::unique_ptr<libdeflate_decompressor, decltype(&libdeflate_free_decompressor)>;
+
+/// One for each thread that ever inflated something: to make one takes as long as to inflate a short array.
+libdeflate_decompressor* decompressorOfThread() {
+    thread_local Decompressor decompressor(nullptr, &libdeflate_free_decompressor);
     if (!decompressor) {
+        decompressor.reset(libdeflate_alloc_decompressor());
+    }
+    return decompressor.get();
+}
+
+} // namespace
+
+bool inflateExactly(std::span<const char> stream, std::span<char> destination) {
+    libdeflate_decompressor* const decompressor = decompressorOfThread();
+    if (decompressor == nullptr) {
         throw std::bad_alloc(); // says nothing about the stream
     }
     // Without a place for the actual size the library insists on the exact one.
-    return libdeflate_zlib_decompress(decompressor.get(), stream.data(), stream.size(), destination.data(),
+    return libdeflate_zlib_decompress(decompressor, stream.data(), stream.size(), destination.data(),
                                       destination.size(), nullptr) == LIBDEFLATE_SUCCESS;
 }
 
