@@ -33,6 +33,10 @@ class IncludeDirection(unittest.TestCase):
             for include in ("<fbxsdk/FbxTime.h>", '"scene/Node.h"', '"core/Time.h"', '"fbxsdk.h"'):
                 self.assertTrue(self.check(file, f"#include {include}\n"), (file, include))
 
+    def test_lets_the_number_of_threads_be_told_in_one_place(self):
+        for file, refused in (("src/MaximumThreads.cpp", False), ("src/Fbx.cpp", True), ("src/sdk/SdkContext.cpp", True)):
+            self.assertEqual(bool(self.check(file, "#include <fbxsdk/extensions/Threads.h>\n")), refused, file)
+
     def test_refuses_one_adapter_in_the_other_and_both_in_what_they_share(self):
         for file, include in (("src/sdk/SdkContext.cpp", '"faithful/Scene.h"'), ("src/faithful/Scene.cpp", '"FbxSdk.h"'),
                               ("src/faithful/Scene.cpp", '"sdk/NodeGeometry.h"'), ("src/access/NodeWalk.h", '"FbxSdk.h"'),

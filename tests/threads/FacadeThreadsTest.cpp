@@ -10,6 +10,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <string>
 #include <thread>
 
@@ -98,8 +99,24 @@ void fillStrip(TnFbxMesh& mesh, int squares) {
     mesh.setValidColours(true);
 }
 
+struct ThreadsScope {
+    explicit ThreadsScope(int count) { setMaximumThreads(count); }
+    ThreadsScope(const ThreadsScope&) = delete;
+    ThreadsScope& operator=(const ThreadsScope&) = delete;
+    ~ThreadsScope() { setMaximumThreads(1); }
+};
+
+TEST(FacadeThreads, WorkOnTheCallersThreadUnlessToldOtherwise) {
+    EXPECT_EQ(maximumThreads(), 1);
+    const ThreadsScope threads(3);
+    EXPECT_EQ(maximumThreads(), 3);
+    setMaximumThreads(0);
+    EXPECT_EQ(maximumThreads(), static_cast<int>(std::max(1U, std::thread::hardware_concurrency())));
+}
+
 TEST(FacadeThreads, WriteTheArraysOfALargeMeshAtTheSameTime) {
     constexpr int kSquares = 20'000;
+    const ThreadsScope threads(3);
     const TemporaryFolder folder;
     TnFbxMesh mesh;
     mesh.setName("strip");

@@ -6,6 +6,7 @@
 #include <charconv>
 #include <cmath>
 #include <cstdio>
+#include <cstdlib>
 #include <exception>
 #include <functional>
 #include <iostream>
@@ -19,6 +20,7 @@
 #include <CLI/CLI.hpp>
 
 #include "Commands.h"
+#include "Fbx.h"
 #include "LookCommands.h"
 #include "Manual.h"
 #include "Similarity.h"
@@ -250,6 +252,8 @@ int runToTheEnd(int argc, char** argv) {
 
 int main(int argc, char** argv) {
     try {
+        if (std::getenv("TARNELL_FBX_THREADS") == nullptr)
+            Tarnell::Fbx::setMaximumThreads(0);
         return runToTheEnd(argc, argv);
     } catch (const std::exception& error) { // before a command had a file
         std::fprintf(stderr, "tarnell-fbx: %s\n", error.what());

@@ -10,6 +10,8 @@
 #include <limits>
 #include <memory>
 
+#include <fbxsdk/extensions/Threads.h>
+
 #include "container/ByteOrder.h"
 #include "core/Parallel.h"
 
@@ -153,6 +155,10 @@ std::size_t BinarySink::storeOffset(char* bytes, std::uint64_t offset) const {
 // place where it comes to stand is added in the end: the bytes are those of parts that are written one after the other.
 void BinarySink::parts(std::span<const Part> list) {
     assert(mOpen.empty() || mOpen.back().hasBlock);
+    if (extensions::maximumThreads() == 1) {
+        RecordSink::parts(list);
+        return;
+    }
     std::vector<MemoryOutput> outputs(list.size());
     std::vector<std::unique_ptr<BinarySink>> fragments;
     fragments.reserve(list.size());

@@ -1,20 +1,66 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Independent work on all cores.
+// Independent work on several threads, and how many there may be.
 #include "core/Parallel.h"
 
 #include <algorithm>
 #include <atomic>
+#include <charconv>
+#include <cstdlib>
 #include <exception>
 #include <mutex>
+#include <string_view>
 #include <system_error>
 #include <thread>
 #include <vector>
 
+#include <fbxsdk/extensions/Threads.h>
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
+
+int threadsOfMachine() { return static_cast<int>(std::max(1U, std::thread::hardware_concurrency())); }
+
+int meantBy(int count) { return count == 0 ? threadsOfMachine() : std::max(count, 1); }
+
+/// What the environment says; 1 when it says nothing, or no number.
+int initialMaximum() {
+    const char* const text = std::getenv("TARNELL_FBX_THREADS");
+    const std::string_view digits(text ? text : "");
+    int count = 1;
+    const auto [end, error] = std::from_chars(digits.data(), digits.data() + digits.size(), count);
+    return error == std::errc() && end == digits.data() + digits.size() ? meantBy(count) : 1;
+}
+
+std::atomic<int>& maximum() {
+    static std::atomic<int> count{initialMaximum()};
+    return count;
+}
+
+/// Threads that were started and have not ended yet, of all calls.
+std::atomic<int> helpersAtWork{0};
+
+/// Leave to start some threads, for as long as it lives; fewer than asked for, or none, when others are at work.
+class HelperLeave {
+public:
+    explicit HelperLeave(std::size_t wanted) {
+        int atWork = helpersAtWork.load();
+        do {
+            const int left = std::max(0, maximum().load() - 1 - atWork);
+            mCount = static_cast<int>(std::min(wanted, static_cast<std::size_t>(left)));
+        } while (mCount > 0 && !helpersAtWork.compare_exchange_weak(atWork, atWork + mCount));
+    }
+    HelperLeave(const HelperLeave&) = delete;
+    HelperLeave& operator=(const HelperLeave&) = delete;
+    ~HelperLeave() { helpersAtWork -= mCount; }
+
+    [[nodiscard]] int count() const { return mCount; }
+
+private:
+    int mCount = 0;
+};
 
 class Crew {
 public:
@@ -56,12 +102,12 @@ private:
 } // namespace
 
 void forEachInParallel(std::size_t count, const std::function<void(std::size_t)>& work) {
-    const std::size_t helpers = std::min<std::size_t>(std::max(1U, std::thread::hardware_concurrency()), count);
+    const HelperLeave leave(count > 1 ? count - 1 : 0);
     Crew crew(count, work);
     {
         std::vector<std::jthread> threads;
         try {
-            for (std::size_t i = 1; i < helpers; ++i) {
+            for (int i = 0; i < leave.count(); ++i) {
                 threads.emplace_back([&crew] { crew.run(); });
             }
         } catch (const std::exception&) { // no thread, or no memory for one: the others will do
@@ -72,4 +118,9 @@ void forEachInParallel(std::size_t count, const std::function<void(std::size_t)>
 }
 
 } // namespace detail
+
+int extensions::maximumThreads() { return detail::maximum(); }
+
+void extensions::setMaximumThreads(int count) { detail::maximum() = detail::meantBy(count); }
+
 FBXSDK_NAMESPACE_END

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Independent work on all cores.
+// Independent work on several threads.
 #pragma once
 
 #include <cstddef>
@@ -12,9 +12,9 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Calls `work` with each number below the count, on this thread and on as many others as the machine has. Returns when
-/// all calls have; throws what the first of them to fail threw, and starts no further ones then. Where no thread can be
-/// had, this one does it all.
+/// Calls `work` with each number below the count, on this thread and on as many others as `maximumThreads()` leaves.
+/// Returns when all calls have; throws what the first of them to fail threw, and starts no further ones then. Where no
+/// thread can be had, this one does it all.
 void forEachInParallel(std::size_t count, const std::function<void(std::size_t)>& work);
 
 } // namespace detail

@@ -15,6 +15,8 @@
 
 #include <gtest/gtest.h>
 
+#include <fbxsdk/extensions/Threads.h>
+
 #include "support/RecordText.h"
 #include "support/SinkOutput.h"
 
@@ -72,11 +74,11 @@ private:
     std::unique_ptr<RecordTree> mTree;
 };
 
-INSTANTIATE_TEST_SUITE_P(EveryLayout, SinkLayout,
-                         testing::Values(Layout{Container::binary, 6100}, Layout{Container::binary, 7100},
-                                         Layout{Container::binary, 7400}, Layout{Container::binary, 7500},
-                                         Layout{Container::ascii, 6100}, Layout{Container::ascii, 7100},
-                                         Layout{Container::ascii, 7200}, Layout{Container::ascii, 7500}));
+const auto kLayouts =
+    testing::Values(Layout{Container::binary, 6100}, Layout{Container::binary, 7100}, Layout{Container::binary, 7400},
+                    Layout{Container::binary, 7500}, Layout{Container::ascii, 6100}, Layout{Container::ascii, 7100},
+                    Layout{Container::ascii, 7200}, Layout{Container::ascii, 7500});
+INSTANTIATE_TEST_SUITE_P(EveryLayout, SinkLayout, kLayouts);
 
 TEST_P(SinkLayout, StatesItsVersion) {
     readBack([](RecordSink&) {});
@@ -302,6 +304,12 @@ std::vector<RecordSink::Part> manyParts() {
     return parts;
 }
 
+struct SinkParts : SinkLayout {
+    SinkParts() { extensions::setMaximumThreads(3); }
+    ~SinkParts() override { extensions::setMaximumThreads(1); }
+};
+INSTANTIATE_TEST_SUITE_P(EveryLayout, SinkParts, kLayouts);
+
 void emitWhole(RecordSink& sink, const std::function<void()>& content) {
     sink.beginRecord("Whole");
     sink.beginBlock();
@@ -312,7 +320,7 @@ void emitWhole(RecordSink& sink, const std::function<void()>& content) {
     sink.endRecord();
 }
 
-TEST_P(SinkLayout, WritesPartsAsIfOneAfterTheOther) {
+TEST_P(SinkParts, WritesPartsAsIfOneAfterTheOther) {
     const std::string inTurn = bytesOf([](RecordSink& sink) {
         emitWhole(sink, [&] {
             for (const RecordSink::Part& part : manyParts())
@@ -324,7 +332,7 @@ TEST_P(SinkLayout, WritesPartsAsIfOneAfterTheOther) {
     EXPECT_TRUE(inTurn == atOnce);
 }
 
-TEST_P(SinkLayout, WritesPartsOfParts) {
+TEST_P(SinkParts, WritesPartsOfParts) {
     const std::string nested = bytesOf([](RecordSink& sink) {
         const RecordSink::Part both[] = {[](RecordSink& first) { first.parts(manyParts()); },
                                          [](RecordSink& second) { emitPart(second, 3); }};
@@ -339,7 +347,7 @@ TEST_P(SinkLayout, WritesPartsOfParts) {
     EXPECT_TRUE(nested == inTurn);
 }
 
-TEST_P(SinkLayout, PassesOnWhatAPartThrows) {
+TEST_P(SinkParts, PassesOnWhatAPartThrows) {
     const auto emit = [](RecordSink& sink) {
         std::vector<RecordSink::Part> parts = manyParts();
         parts[7] = [](RecordSink&) { throw std::bad_alloc(); };

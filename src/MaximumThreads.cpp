@@ -1,0 +1,33 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// On how many threads a call may work. Only the bundled platform can be told: with another one the number is kept and
+// of no effect.
+#include "Fbx.h"
+
+#ifdef TARNELL_FBX_EXTERNAL_FBXSDK
+#include <algorithm>
+#include <atomic>
+#else
+#include <fbxsdk/extensions/Threads.h>
+#endif
+
+namespace Tarnell::Fbx {
+
+#ifdef TARNELL_FBX_EXTERNAL_FBXSDK
+namespace {
+
+std::atomic<int> chosen{1};
+
+} // namespace
+
+int maximumThreads() { return chosen; }
+
+void setMaximumThreads(int count) { chosen = std::max(count, 1); }
+#else
+int maximumThreads() { return fbxsdk::extensions::maximumThreads(); }
+
+void setMaximumThreads(int count) { fbxsdk::extensions::setMaximumThreads(count); }
+#endif
+
+} // namespace Tarnell::Fbx
