@@ -1,4 +1,4 @@
-# One object library per room of the platform, so that a room can be built and tested alone; one test executable per
+# One object library per module of the platform, so that a module can be built and tested alone; one test executable per
 # folder of tests.
 
 # tarnell_precompile(TARGET header...)
@@ -41,9 +41,10 @@ function(tarnell_export name)
   set_target_properties(${name} PROPERTIES LINK_DEPENDS "${map}")
 endfunction()
 
-# tarnell_room(NAME [NEEDS room...] [LIBRARIES library...]): every source below src/NAME. A room may use those it needs,
-# and those that these need. `fbxsdk_up_to_NAME` is all of them, with the internals visible: what the room's tests link.
-function(tarnell_room name)
+# tarnell_module(NAME [NEEDS module...] [LIBRARIES library...]): every source below src/NAME. A module may use those it
+# needs, and those that these need. `fbxsdk_up_to_NAME` is all of them, with the internals visible: what the module's
+# tests link.
+function(tarnell_module name)
   cmake_parse_arguments(ARG "" "" "NEEDS;LIBRARIES" ${ARGN})
   file(GLOB_RECURSE sources CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/src/${name}/*.cpp")
   add_library(fbxsdk_${name} OBJECT ${sources})
@@ -54,18 +55,18 @@ function(tarnell_room name)
   tarnell_precompile_standard_headers(fbxsdk_${name})
   tarnell_count_steps(fbxsdk_${name})
 
-  set(rooms ${name})
+  set(modules ${name})
   foreach(need IN LISTS ARG_NEEDS)
     get_property(below GLOBAL PROPERTY fbxsdk_up_to_${need})
-    list(APPEND rooms ${below})
+    list(APPEND modules ${below})
   endforeach()
-  list(REMOVE_DUPLICATES rooms)
-  set_property(GLOBAL PROPERTY fbxsdk_up_to_${name} ${rooms})
+  list(REMOVE_DUPLICATES modules)
+  set_property(GLOBAL PROPERTY fbxsdk_up_to_${name} ${modules})
   add_library(fbxsdk_up_to_${name} INTERFACE)
-  foreach(room IN LISTS rooms)
-    target_link_libraries(fbxsdk_up_to_${name} INTERFACE fbxsdk_${room} $<TARGET_OBJECTS:fbxsdk_${room}>)
+  foreach(module IN LISTS modules)
+    target_link_libraries(fbxsdk_up_to_${name} INTERFACE fbxsdk_${module} $<TARGET_OBJECTS:fbxsdk_${module}>)
   endforeach()
-  set_property(GLOBAL APPEND PROPERTY fbxsdk_rooms ${name})
+  set_property(GLOBAL APPEND PROPERTY fbxsdk_modules ${name})
 endfunction()
 
 # To read GoogleTest takes longer than to compile most tests: an empty program reads it for all.

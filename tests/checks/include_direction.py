@@ -6,7 +6,7 @@
 Usage: include_direction.py PROJECT_ROOT
 
 Each rule is a row: which files it is about, which includes it judges, and what is allowed among them. A new rule is a
-new row. Among the rooms of the platform, each file may use those that its room needs.
+new row. Among the modules of the platform, each file may use those that its module needs.
 """
 
 import re
@@ -75,14 +75,14 @@ def violations_of(rule, root):
 
 
 def violations(root):
-    return [violation for rule in RULES for violation in violations_of(rule, root)] + list(room_violations(root))
+    return [violation for rule in RULES for violation in violations_of(rule, root)] + list(module_violations(root))
 
 
-# The platform's rooms: which may use which is said once, where they are built.
-ROOMS_FILE = "fbxsdk/CMakeLists.txt"
-ROOM = re.compile(r"tarnell_room\((\w+)(?: NEEDS ([\w ]+?))?(?: LIBRARIES [^)]*)?\)")
+# The platform's modules: which may use which is said once, where they are built.
+MODULES_FILE = "fbxsdk/CMakeLists.txt"
+MODULE = re.compile(r"tarnell_module\((\w+)(?: NEEDS ([\w ]+?))?(?: LIBRARIES [^)]*)?\)")
 PLATFORM_INCLUDE = re.compile(r'^(?:"(\w+)/[^"]+"|<fbxsdk/([\w/]+)\.h>)$')
-# A class belongs to the room of the source that bears its name; these have none.
+# A class belongs to the module of the source that bears its name; these have none.
 OTHER_HEADERS = {
     "FbxArch": "core", "FbxArray": "core", "FbxColor": "core", "FbxEuler": "core", "FbxTypes": "core",
     "FbxVector2": "core", "FbxVector4": "core", "FbxTransform": "core", "FbxSystemUnit": "scene",
@@ -91,37 +91,37 @@ OTHER_HEADERS = {
 }
 
 
-def rooms(root):
-    """Each room with those that it may use."""
-    path = root / ROOMS_FILE
+def modules(root):
+    """Each module with those that it may use."""
+    path = root / MODULES_FILE
     text = path.read_text(encoding="utf-8") if path.exists() else ""
     usable = {}
-    for match in ROOM.finditer(text):  # in the order of their needs
+    for match in MODULE.finditer(text):  # in the order of their needs
         needs = (match[2] or "").split()
         usable[match[1]] = {match[1], *needs, *(below for need in needs for below in usable[need])}
     return usable
 
 
-def room_violations(root):
-    usable = rooms(root)
-    room_of_class = dict(OTHER_HEADERS)
+def module_violations(root):
+    usable = modules(root)
+    module_of_class = dict(OTHER_HEADERS)
     sources = [path for pattern in ("*.h", "*.cpp") for path in sorted((root / "fbxsdk/src").rglob(pattern))]
     for path in sources:
         if path.suffix == ".cpp" and path.stem.startswith("Fbx"):
-            room_of_class[path.stem] = path.relative_to(root / "fbxsdk/src").parts[0]
+            module_of_class[path.stem] = path.relative_to(root / "fbxsdk/src").parts[0]
     headers = sorted((root / "fbxsdk/include/fbxsdk").glob("*.h"))
     for path in (headers if usable else []):
-        if path.stem not in room_of_class:
+        if path.stem not in module_of_class:
             yield f"{path.relative_to(root)}: no source bears its name: add it to OTHER_HEADERS"
     for path in sources + headers:
-        room = room_of_class.get(path.stem) if path in headers else path.relative_to(root / "fbxsdk/src").parts[0]
+        module = module_of_class.get(path.stem) if path in headers else path.relative_to(root / "fbxsdk/src").parts[0]
         source = without_comments(path.read_text(encoding="utf-8"))
         for match in INCLUDE.finditer(source):
             included = PLATFORM_INCLUDE.match(match[1])
-            other = included and (included[1] or room_of_class.get(included[2]))
-            if room in usable and other in usable and other not in usable[room]:
+            other = included and (included[1] or module_of_class.get(included[2]))
+            if module in usable and other in usable and other not in usable[module]:
                 line = source.count("\n", 0, match.start(1)) + 1
-                yield f"{path.relative_to(root)}:{line}: {match[1]}: {room} does not need {other}"
+                yield f"{path.relative_to(root)}:{line}: {match[1]}: {module} does not need {other}"
 
 
 def main():
@@ -129,8 +129,8 @@ def main():
     if not any(root.glob("include/Tn*.h")):
         sys.exit(f"{root}: no library headers here")
     found = violations(root)
-    if not rooms(root):
-        found.append(f"{ROOMS_FILE}: no rooms here")
+    if not modules(root):
+        found.append(f"{MODULES_FILE}: no modules here")
     print("\n".join(found))
     return 1 if found else 0
 

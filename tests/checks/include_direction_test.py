@@ -48,10 +48,10 @@ class IncludeDirection(unittest.TestCase):
             for include in ('"TnFbxTime.h"', "<FbxSdk.h>", '"model/FrameArithmetic.h"', '"Fbx.h"'):
                 self.assertTrue(self.check(file, f"#include {include}\n"), (file, include))
 
-    def check_rooms(self, files):
-        files["fbxsdk/CMakeLists.txt"] = ("tarnell_room(core LIBRARIES Threads::Threads)\ntarnell_room(object NEEDS core)\n"
-                                          "tarnell_room(document NEEDS core)\n"
-                                          "tarnell_room(scene NEEDS object document)\n")
+    def check_modules(self, files):
+        files["fbxsdk/CMakeLists.txt"] = ("tarnell_module(core LIBRARIES Threads::Threads)\ntarnell_module(object NEEDS core)\n"
+                                          "tarnell_module(document NEEDS core)\n"
+                                          "tarnell_module(scene NEEDS object document)\n")
         with tempfile.TemporaryDirectory() as folder:
             for file, source in files.items():
                 path = Path(folder) / file
@@ -59,25 +59,25 @@ class IncludeDirection(unittest.TestCase):
                 path.write_text(source, encoding="utf-8")
             return violations(Path(folder))
 
-    def test_refuses_a_room_that_is_not_needed(self):
+    def test_refuses_a_module_that_is_not_needed(self):
         for file, include in (("fbxsdk/src/object/ObjectData.cpp", '"scene/SceneData.h"'),
                               ("fbxsdk/src/object/ObjectData.h", '"document/Document.h"'),
                               ("fbxsdk/src/core/deep/Time.cpp", '"object/ObjectData.h"'),
                               ("fbxsdk/src/object/ObjectData.cpp", "<fbxsdk/FbxNode.h>"),
                               ("fbxsdk/include/fbxsdk/FbxObject.h", "<fbxsdk/FbxNode.h>")):
-            found = self.check_rooms({"fbxsdk/src/scene/FbxNode.cpp": "", "fbxsdk/src/object/FbxObject.cpp": "",
+            found = self.check_modules({"fbxsdk/src/scene/FbxNode.cpp": "", "fbxsdk/src/object/FbxObject.cpp": "",
                                       file: f"\n#include {include}\n"})
             self.assertEqual(len(found), 1, (file, include, found))
             self.assertTrue(found[0].startswith(f"{file}:2: {include}"), found)
 
-    def test_lets_rooms_use_what_they_need_and_what_that_needs(self):
-        found = self.check_rooms({"fbxsdk/src/object/FbxObject.cpp": '#include "core/Time.h"\n',
+    def test_lets_modules_use_what_they_need_and_what_that_needs(self):
+        found = self.check_modules({"fbxsdk/src/object/FbxObject.cpp": '#include "core/Time.h"\n',
                                   "fbxsdk/src/scene/FbxNode.cpp": '#include <fbxsdk/FbxObject.h>\n#include "core/Time.h"\n'
                                                                   '#include "document/Document.h"\n'})
         self.assertEqual(found, [])
 
-    def test_refuses_a_public_header_of_no_room(self):
-        found = self.check_rooms({"fbxsdk/include/fbxsdk/FbxNew.h": ""})
+    def test_refuses_a_public_header_of_no_module(self):
+        found = self.check_modules({"fbxsdk/include/fbxsdk/FbxNew.h": ""})
         self.assertEqual(len(found), 1, found)
 
     def test_names_file_and_line(self):
