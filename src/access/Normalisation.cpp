@@ -55,7 +55,7 @@ bool detail::Triangulation::visit(fbxsdk::FbxNode& node) {
 void detail::Triangulation::warnOfCoarser() const {
     if (const int count = coarserSurfaces(mConverter); count > 0) {
         warn(std::to_string(count) + (count == 1 ? " surface" : " surfaces") +
-             " became a mesh of coarser steps than asked for: the control points are few for so many samples");
+             " became a coarser mesh than asked for: it has too few control points for so many samples");
     }
 }
 

@@ -17,7 +17,7 @@ namespace {
 using detail::ObjectWarnings;
 
 constexpr const char* kNoNumbers = "values that are not finite numbers are written as they are, in ASCII as 0";
-constexpr const char* kNoRate = "samples at a rate that is none are written as keys at times that are none";
+constexpr const char* kNoRate = "samples at an invalid rate are written as keys at invalid times";
 
 bool isRate(float framesPerSecond) { return std::isfinite(framesPerSecond) && framesPerSecond > 0.0f; }
 
@@ -145,11 +145,11 @@ void detail::warnAboutRate(float framesPerSecond, bool isCustom) {
     char rate[32];
     std::snprintf(rate, sizeof rate, "%.9g", static_cast<double>(framesPerSecond));
     if (!isRate(framesPerSecond)) {
-        warn(std::string(rate) + " frames per second are no rate: who reads the file takes another");
+        warn(std::string(rate) + " frames per second is not a valid rate: readers of the file use another one");
     } else if (isCustom) {
         warn(std::string(rate) +
-             " frames per second: the file says that its rate is a custom one, but not which; times are right, and who "
-             "counts frames takes another rate");
+             " frames per second: the file says that its rate is a custom one, but not which; times are exact, frame "
+             "numbers depend on the reader");
     }
 }
 

@@ -26,13 +26,12 @@ using fbxsdk::FbxAMatrix;
 using fbxsdk::FbxVector4;
 
 constexpr const char* kTooManyCorners = "is left out: the polygons have more polygon vertices than the mesh";
-constexpr const char* kFlat = "its points were multiplied by a transform that flattens: they are written where they "
-                              "are, without the transform";
-constexpr const char* kNoCache = "its points move, and no point cache was asked for: they are written as they stand "
-                                 "first";
-constexpr const char* kOtherSets =
-    "it has another number of sets of points than the range has frames: they are written "
-    "as they stand first";
+constexpr const char* kFlat = "its points were multiplied by a singular transform: they are written where they are, "
+                              "without the transform";
+constexpr const char* kNoCache = "its points move, and no point cache was asked for: the first set of points is "
+                                 "written";
+constexpr const char* kOtherSets = "the number of its sets of points is not that of the frames of the range: the first "
+                                   "set is written";
 
 float asFloat(double value) { return static_cast<float>(value); }
 

@@ -120,7 +120,7 @@ bool Scene::selectFrames(const TnFbxReadInfo& info) {
     mFileRate = exactRate(settings);
     const double rate = info.getUseSampleFPS() ? exactRate(info.getSampleFPS()).rate : mFileRate;
     if (!std::isfinite(rate) || !(rate > 0.0)) {
-        return fail("a sample rate of " + std::to_string(rate) + " frames per second is none");
+        return fail("a sample rate of " + std::to_string(rate) + " frames per second is not valid");
     }
     mTimeline = Timeline(rate, animatedSpan());
     return setFrame(info.getFrame());
@@ -128,7 +128,7 @@ bool Scene::selectFrames(const TnFbxReadInfo& info) {
 
 bool Scene::setFrame(float frame) {
     if (!std::isfinite(frame)) {
-        return fail("the frame of the static values is no number");
+        return fail("the frame of the static values is not a finite number");
     }
     mFrame = frame;
     mNow = mTimeline.at(static_cast<double>(frame));

@@ -93,7 +93,7 @@ bool FbxSdk::getNull(TnFbxTime& time, bool global, bool useSampleFPS, float samp
     fbxsdk::FbxNodeAttribute* attribute = node->GetNodeAttribute();
     auto* source = fbxsdk::FbxCast<fbxsdk::FbxNull>(attribute);
     if (attribute != nullptr && source == nullptr) {
-        return fail("the node is no null");
+        return fail("the node is not a null");
     }
     null.setName(node->GetName());
     if (!getTransform(time, global, useSampleFPS, sampleFPS, node, null, geometric)) {

@@ -443,7 +443,7 @@ bool FbxSdk::getProducerCamera(fbxsdk::FbxCamera* camera, TnFbxReadInfo& info, T
     }
     fbxsdk::FbxNode* node = camera->GetNode(0);
     if (node == nullptr) {
-        return fail(std::string("\"") + name + "\" stands on no node");
+        return fail(std::string("\"") + name + "\" is not on any node");
     }
     if (info.getAllObjects()) {
         getProducerCamera(node, camera, cameras[index], name);

@@ -112,7 +112,7 @@ TEST_F(WriteWarnings, NameSamplesAtARateThatIsNone) {
     null.setTransformValueAt(TnFbxTransform::kFbxTransformPositionX, test::timeOf(1, 2, kNaN), {1.0f, 2.0f});
     objects.nulls = {&null};
 
-    EXPECT_THAT(warnings(), ElementsAre(AllOf(StartsWith("null: "), HasSubstr("rate that is none"))));
+    EXPECT_THAT(warnings(), ElementsAre(AllOf(StartsWith("null: "), HasSubstr("invalid rate"))));
 }
 
 TEST_F(WriteWarnings, NameMeshesThatContradictThemselves) {

@@ -461,7 +461,7 @@ class Convert(unittest.TestCase):
         result = run("convert", "--force", SHOT, self.out)
 
         self.assertEqual(result.returncode, 1)
-        self.assertIn(self.out + ": cannot be written: nobody reads it", result.stderr)
+        self.assertIn(self.out + ": cannot be written: no process reads the pipe", result.stderr)
 
     def test_writes_to_standard_output_and_the_null_device(self):
         self.assertEqual(run("convert", "--force", SHOT, "/dev/null").returncode, 0)

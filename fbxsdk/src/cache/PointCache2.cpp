@@ -45,7 +45,7 @@ const char* headerFault(const PointCacheHeader& header) {
     if (header.sampleCount > 0 && sampleBytes(header) > (kMostBytes - kHeaderBytes) / header.sampleCount)
         return "more samples than a file can hold";
     if (!(std::abs(header.startFrame) <= kMostFrame))
-        return "a start frame that is none";
+        return "an invalid start frame";
     // Large frame numbers are rounded in the header: every sample would be at another frame.
     constexpr double kHalfFrame = 0.5;
     const auto stored = static_cast<double>(static_cast<float>(header.startFrame));

@@ -159,7 +159,7 @@ bool AsciiReader::failUnexpected(const char* place, const std::string& expected)
 /// is one.
 bool AsciiReader::refuseZeros(std::string_view token) {
     const std::size_t zero = token.find('\0');
-    return zero == std::string_view::npos || fail(token.data() + zero, "a byte of zero stands in the text");
+    return zero == std::string_view::npos || fail(token.data() + zero, "a zero byte in the text");
 }
 
 /// Whether a name and its colon come next: the start of a record, where otherwise a value might stand.

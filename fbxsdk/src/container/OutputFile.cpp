@@ -88,7 +88,7 @@ void OutputFile::report(FbxStatus& status) const {
 
 std::string OutputFile::reason() const {
     const bool isUnread = mDirect && mError == ENXIO;
-    return "cannot be written: " + (isUnread ? "nobody reads it" : std::generic_category().message(mError));
+    return "cannot be written: " + (isUnread ? "no process reads the pipe" : std::generic_category().message(mError));
 }
 
 bool OutputFile::fail(int error, FbxStatus& status) {

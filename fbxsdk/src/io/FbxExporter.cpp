@@ -61,7 +61,7 @@ bool FbxExporter::Initialize(const char* pFileName, int pFileFormat, FbxIOSettin
         return false;
     }
     if (FbxPathUtils::Exist(pFileName)) {
-        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: a folder stands there", pFileName);
+        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: this is a folder", pFileName);
         return false;
     }
     mFileFormat = writer;

@@ -208,10 +208,10 @@ TEST(AsciiReader, AcceptsZerosBehindTheLastRecord) {
 
 TEST(AsciiReader, RefusesZerosAnywhereElse) {
     const std::string zeros(3, '\0');
-    EXPECT_EQ(asciiText("A: 1\n" + zeros + "Objects: { }"), "test.fbx: line 3: a byte of zero stands in the text");
-    EXPECT_EQ(asciiText("A: 1\n" + zeros + "\nObjects: { }"), "test.fbx: line 3: a byte of zero stands in the text");
-    EXPECT_EQ(asciiText("A: 1\nObj" + zeros + "ects: { }"), "test.fbx: line 3: a byte of zero stands in the text");
-    EXPECT_EQ(asciiText("A: T" + zeros + "\n"), "test.fbx: line 2: a byte of zero stands in the text");
+    EXPECT_EQ(asciiText("A: 1\n" + zeros + "Objects: { }"), "test.fbx: line 3: a zero byte in the text");
+    EXPECT_EQ(asciiText("A: 1\n" + zeros + "\nObjects: { }"), "test.fbx: line 3: a zero byte in the text");
+    EXPECT_EQ(asciiText("A: 1\nObj" + zeros + "ects: { }"), "test.fbx: line 3: a zero byte in the text");
+    EXPECT_EQ(asciiText("A: T" + zeros + "\n"), "test.fbx: line 2: a zero byte in the text");
     EXPECT_NE(asciiText("A: 1" + zeros + "2\n").find("line 2"), std::string::npos);
     EXPECT_NE(asciiText("A: *1 { a: 1" + zeros + "2 }\n").find("line 2"), std::string::npos);
     EXPECT_EQ(asciiText("A: \"x" + std::string(1, '\0') + "y\""), "A: \"x" + std::string(1, '\0') + "y\"");

@@ -329,7 +329,7 @@ TEST(OutputFile, GivesUpAPipeThatNobodyReads) {
 
     EXPECT_FALSE(writeFile(pipe, "content", status));
 
-    EXPECT_EQ(std::string(status.GetErrorString()), pipe + ": cannot be written: nobody reads it");
+    EXPECT_EQ(std::string(status.GetErrorString()), pipe + ": cannot be written: no process reads the pipe");
     EXPECT_TRUE(fs::is_fifo(pipe));
 }
 
