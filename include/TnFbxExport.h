@@ -4,13 +4,14 @@
 // What the shared library exports.
 #pragma once
 
-/// Marks a class or function that the shared library exports. Of a class these are all member functions that
-/// are not marked otherwise.
 #if defined(TARNELL_FBX_BUILDING)
+/// Marks what the shared library exports; of a class that is every member function without another mark.
 #define TARNELL_FBX_API __attribute__((visibility("default")))
-#else
-#define TARNELL_FBX_API
-#endif
-
-/// Marks a private member function of an exported class: it is not exported.
+/// Marks a private member function of an exported class that the shared library keeps to itself.
 #define TARNELL_FBX_LOCAL __attribute__((visibility("hidden")))
+#else
+/// Marks what the shared library exports; of a class that is every member function without another mark.
+#define TARNELL_FBX_API
+/// Marks a private member function of an exported class that the shared library keeps to itself.
+#define TARNELL_FBX_LOCAL
+#endif

@@ -8,7 +8,7 @@ import tempfile
 import unittest
 from pathlib import Path
 
-from exported_symbols import ROOT, SETTINGS, functions_and_classes, name_of, violations
+from exported_symbols import ROOT, SETTINGS, functions_and_classes, missing_calls, name_of, violations
 
 HEADER = """
 namespace house {
@@ -71,6 +71,10 @@ class ExportedSymbols(unittest.TestCase):
 
     def test_accepts_exceptions(self):
         self.assertEqual(self.check([*PUBLIC, "house::Door::oil()"], [(r"house::Door::oil", "why")]), [])
+
+    def test_refuses_that_functions_in_headers_call_what_is_missing(self):
+        self.assertEqual(list(missing_calls(["house::Door::oil()"], [*PUBLIC, "house::Door::oil()"])), [])
+        self.assertEqual(len(list(missing_calls(["house::Door::oil()"], PUBLIC))), 1)
 
     def test_refuses_public_functions_that_are_missing(self):
         for missing in ("house::number()", "house::Door::operator<<(int)", "house::Door::Door()"):

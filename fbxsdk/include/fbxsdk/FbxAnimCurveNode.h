@@ -73,7 +73,7 @@ public:
 
 protected:
     /// Takes a curve that is cut off out of its channels.
-    void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
+    FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
     struct Channel {

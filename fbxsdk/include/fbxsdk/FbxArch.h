@@ -8,11 +8,15 @@
 #include <cstdint>
 
 #if defined(FBXSDK_BUILDING)
-/// Marks what the shared library exports.
+/// Marks what the shared library exports; of a class that is every member function without another mark.
 #define FBXSDK_DLL __attribute__((visibility("default")))
+/// Marks a private or protected member function of an exported class that the shared library keeps to itself.
+#define FBXSDK_LOCAL __attribute__((visibility("hidden")))
 #else
-/// Marks what the shared library exports.
+/// Marks what the shared library exports; of a class that is every member function without another mark.
 #define FBXSDK_DLL
+/// Marks a private or protected member function of an exported class that the shared library keeps to itself.
+#define FBXSDK_LOCAL
 #endif
 
 /// The namespace of the API, for sources that write it by this macro.

@@ -37,7 +37,7 @@ public:
 
 protected:
     /// Keeps the list of channels in step with the connections.
-    void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
+    FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
     std::vector<FbxBlendShapeChannel*> mChannels;

@@ -52,10 +52,10 @@ public:
 
 protected:
     /// Keeps the list of targets, and their percentages, in step with the connections.
-    void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
+    FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
-    void completeFullWeights(std::size_t pCount);
+    FBXSDK_LOCAL void completeFullWeights(std::size_t pCount);
 
     std::vector<FbxShape*> mTargets;
     std::vector<double> mFullWeights;

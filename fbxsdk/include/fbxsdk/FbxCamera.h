@@ -148,7 +148,7 @@ public:
 
 private:
     /// The side of the film that angles are measured over, millimetres.
-    [[nodiscard]] double apertureMillimetres() const;
+    [[nodiscard]] FBXSDK_LOCAL double apertureMillimetres() const;
 };
 
 FBXSDK_NAMESPACE_END

@@ -210,10 +210,10 @@ public:
     void Destroy();
 
 protected:
-    FbxLayerElement();
-    virtual ~FbxLayerElement();
+    FBXSDK_LOCAL FbxLayerElement();
+    FBXSDK_LOCAL virtual ~FbxLayerElement();
 
-    void joinOwner(FbxLayerContainer* pOwner);
+    FBXSDK_LOCAL void joinOwner(FbxLayerContainer* pOwner);
     /// Removes entries from the array that the mapping counts in: the index array where indices are in use.
     virtual void removeEntries(int pFirst, int pCount) = 0;
 
@@ -286,8 +286,8 @@ public:                                                                         
     static Class* Create(FbxLayerContainer* pOwner, const char* pName);                                                \
                                                                                                                        \
 protected:                                                                                                             \
-    Class();                                                                                                           \
-    ~Class() override;                                                                                                 \
+    FBXSDK_LOCAL Class();                                                                                              \
+    FBXSDK_LOCAL ~Class() override;                                                                                    \
                                                                                                                        \
 private:                                                                                                               \
     friend struct detail::LayerElementAccess;
@@ -486,7 +486,7 @@ private:
         return static_cast<Element*>(mElements[pSlot]);
     }
     void set(FbxLayerElement* pElement, int pSlot);
-    void forget(const FbxLayerElement& pElement);
+    FBXSDK_LOCAL void forget(const FbxLayerElement& pElement);
 
     FbxLayerContainer& mOwner;
     FbxLayerElement* mElements[kSlotCount] = {};
@@ -527,7 +527,7 @@ protected:
     virtual bool readSource(const detail::GeometrySource& pSource) = 0;
 
     /// For every element that stands in a layer and is mapped that way.
-    void removeElementEntries(FbxLayerElement::EMappingMode pMappingMode, int pFirst, int pCount);
+    FBXSDK_LOCAL void removeElementEntries(FbxLayerElement::EMappingMode pMappingMode, int pFirst, int pCount);
 
 private:
     friend class FbxLayer;
@@ -539,8 +539,8 @@ private:
     };
 
     void loadSource() const;
-    void adopt(FbxLayerElement& pElement);
-    void disown(FbxLayerElement& pElement);
+    FBXSDK_LOCAL void adopt(FbxLayerElement& pElement);
+    FBXSDK_LOCAL void disown(FbxLayerElement& pElement);
     [[nodiscard]] FbxLayer* layerAt(int pIndex) const {
         return pIndex >= 0 && pIndex < GetLayerCount() ? mLayers[static_cast<std::size_t>(pIndex)].get() : nullptr;
     }

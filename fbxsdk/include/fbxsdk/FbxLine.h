@@ -32,7 +32,7 @@ public:
 
 protected:
     /// Fills the object from the file.
-    bool readSource(const detail::GeometrySource& pSource) override;
+    FBXSDK_LOCAL bool readSource(const detail::GeometrySource& pSource) override;
 
 private:
     detail::PlainArray<int> mIndices;

@@ -43,8 +43,8 @@ public:
     [[nodiscard]] detail::ManagerData& data() const { return *mData; }
 
 protected:
-    FbxManager();          ///< For Create.
-    virtual ~FbxManager(); ///< For Destroy.
+    FBXSDK_LOCAL FbxManager();          ///< For Create.
+    FBXSDK_LOCAL virtual ~FbxManager(); ///< For Destroy.
 
 private:
     std::unique_ptr<detail::ManagerData> mData;

@@ -213,16 +213,16 @@ public:
 
 protected:
     /// Keeps parent, children, attributes and materials in step with the connections.
-    void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
+    FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
-    void childConnected(FbxNode& child);
-    void childDisconnected(FbxNode& child);
+    FBXSDK_LOCAL void childConnected(FbxNode& child);
+    FBXSDK_LOCAL void childDisconnected(FbxNode& child);
 
-    [[nodiscard]] detail::NodePivots& pivots() const;
-    [[nodiscard]] detail::DestinationPivots& destinationPivots() const;
-    [[nodiscard]] const FbxVector4& pivotVector(EPivotSet set, detail::PivotVector which) const;
-    void setPivotVector(EPivotSet set, detail::PivotVector which, const FbxVector4& vector);
+    [[nodiscard]] FBXSDK_LOCAL detail::NodePivots& pivots() const;
+    [[nodiscard]] FBXSDK_LOCAL detail::DestinationPivots& destinationPivots() const;
+    [[nodiscard]] FBXSDK_LOCAL const FbxVector4& pivotVector(EPivotSet set, detail::PivotVector which) const;
+    FBXSDK_LOCAL void setPivotVector(EPivotSet set, detail::PivotVector which, const FbxVector4& vector);
 
     FbxNode* mParent = nullptr;
     std::vector<FbxNode*> mChildren;

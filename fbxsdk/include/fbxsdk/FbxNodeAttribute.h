@@ -56,7 +56,7 @@ public:
 
 protected:
     /// Keeps the list of nodes in step with the connections.
-    void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
+    FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
     std::vector<FbxNode*> mNodes;

@@ -83,8 +83,8 @@ public:
     [[nodiscard]] bool& flipNormals() { return mFlipNormals; } ///< The platform's own view of the flag.
 
 protected:
-    FbxNurbsSurfaceBase(FbxManager& pManager, const detail::ClassInfo& pInfo); ///< For derived classes.
-    ~FbxNurbsSurfaceBase() override;
+    FBXSDK_LOCAL FbxNurbsSurfaceBase(FbxManager& pManager, const detail::ClassInfo& pInfo); ///< For derived classes.
+    FBXSDK_LOCAL ~FbxNurbsSurfaceBase() override;
 
 private:
     [[nodiscard]] const Direction& direction(int pDirection) const {
@@ -108,7 +108,7 @@ public:
 
 protected:
     /// Fills the object from the file.
-    bool readSource(const detail::GeometrySource& pSource) override;
+    FBXSDK_LOCAL bool readSource(const detail::GeometrySource& pSource) override;
 };
 
 FBXSDK_NAMESPACE_END

@@ -55,9 +55,9 @@ public:                                                                         
                                                                                                                        \
 protected:                                                                                                             \
     /** For the factories. */                                                                                          \
-    Class(FbxManager& pManager, const detail::ClassInfo& pInfo);                                                       \
+    FBXSDK_LOCAL Class(FbxManager& pManager, const detail::ClassInfo& pInfo);                                          \
     /** Objects are freed by Destroy and by their manager. */                                                          \
-    ~Class() override;                                                                                                 \
+    FBXSDK_LOCAL ~Class() override;                                                                                    \
                                                                                                                        \
 private:                                                                                                               \
     friend class detail::ManagerData;
@@ -70,9 +70,9 @@ public:                                                                         
                                                                                                                        \
 protected:                                                                                                             \
     /** For derived classes. */                                                                                        \
-    Class(FbxManager& pManager, const detail::ClassInfo& pInfo);                                                       \
+    FBXSDK_LOCAL Class(FbxManager& pManager, const detail::ClassInfo& pInfo);                                          \
     /** Objects are freed by Destroy and by their manager. */                                                          \
-    ~Class() override;                                                                                                 \
+    FBXSDK_LOCAL ~Class() override;                                                                                    \
                                                                                                                        \
 private:                                                                                                               \
     friend class detail::ManagerData;
@@ -210,15 +210,15 @@ public:
 
 protected:
     /// Enters the object into the manager's list; for the factories.
-    FbxObject(FbxManager& pManager, const detail::ClassInfo& pInfo);
+    FBXSDK_LOCAL FbxObject(FbxManager& pManager, const detail::ClassInfo& pInfo);
     /// Takes the object out of the manager's list.
-    virtual ~FbxObject();
+    FBXSDK_LOCAL virtual ~FbxObject();
 
     /// Called on both ends after a connection between objects was made or cut, before the call that did it returns.
     /// `pSource` becomes (or was) a source of `pDestination`; one of the two is this object.
-    virtual void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected);
+    FBXSDK_LOCAL virtual void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected);
     /// Called when the object becomes a member of a scene (or leaves it: null).
-    virtual void sceneChanged(FbxScene* pScene);
+    FBXSDK_LOCAL virtual void sceneChanged(FbxScene* pScene);
 
 private:
     friend class detail::ManagerData;

@@ -61,7 +61,7 @@ public:
 
 protected:
     /// Fills the object from the file.
-    bool readSource(const detail::GeometrySource& pSource) override;
+    FBXSDK_LOCAL bool readSource(const detail::GeometrySource& pSource) override;
 
 private:
     [[nodiscard]] const Direction& direction(int pDirection) const {

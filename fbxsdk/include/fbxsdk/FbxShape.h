@@ -25,7 +25,7 @@ public:
 
 protected:
     /// Fills the shape from the file.
-    bool readSource(const detail::GeometrySource& pSource) override;
+    FBXSDK_LOCAL bool readSource(const detail::GeometrySource& pSource) override;
 };
 
 FBXSDK_NAMESPACE_END

@@ -62,7 +62,7 @@ public:
 
 protected:
     /// Keeps the list of clusters in step with the connections.
-    void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
+    FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
     std::vector<FbxCluster*> mClusters;

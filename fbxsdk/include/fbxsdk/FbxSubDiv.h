@@ -21,7 +21,7 @@ public:
 
 protected:
     /// There is nothing to read.
-    bool readSource(const detail::GeometrySource& pSource) override;
+    FBXSDK_LOCAL bool readSource(const detail::GeometrySource& pSource) override;
 };
 
 FBXSDK_NAMESPACE_END

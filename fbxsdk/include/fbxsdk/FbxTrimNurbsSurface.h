@@ -26,7 +26,7 @@ public:
 
 protected:
     /// A boundary has nothing in the file beyond its curves.
-    bool readSource(const detail::GeometrySource& pSource) override;
+    FBXSDK_LOCAL bool readSource(const detail::GeometrySource& pSource) override;
 };
 
 /// A NURBS surface cut by boundaries. Surface and boundaries are the object's sources.
@@ -60,7 +60,7 @@ public:
 
 protected:
     /// Fills the object from the file.
-    bool readSource(const detail::GeometrySource& pSource) override;
+    FBXSDK_LOCAL bool readSource(const detail::GeometrySource& pSource) override;
 
 private:
     bool mFlipNormals = false;
