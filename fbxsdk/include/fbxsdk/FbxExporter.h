@@ -28,7 +28,8 @@ public:
     ///
     /// The file gets its name when all of it is written: until then, and after a failure, an older file of the name
     /// stays as it was. Point caches that wait for their scene (FbxCache::CloseFile) get their names in the same step.
-    /// Large meshes are compressed on all cores; the threads end before the call returns.
+    /// Large meshes are compressed on as many threads as extensions::setMaximumThreads allows; they end before the call
+    /// returns.
     ///
     /// False, with a status, before Initialize, for a document that is no scene, when disk or memory do not suffice,
     /// and when the format cannot hold the scene.
