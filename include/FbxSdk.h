@@ -29,6 +29,7 @@ namespace detail {
 class FrameTimes;
 class GlobalSampler;
 class MemoryAccount;
+class MeshInstances;
 class ObjectWarnings;
 class PropertySampler;
 class ReadScope;
@@ -417,10 +418,11 @@ private:
     fbxsdk::FbxManager* mManager = nullptr; // owned
     fbxsdk::FbxScene* mScene = nullptr;     // the manager's
     fbxsdk::FbxAnimStack* mCurrentAnimStack = nullptr;
-    std::string mFileName;                           // of the file that was loaded last; empty: none
-    std::unique_ptr<detail::MemoryAccount> mMemory;  // of the call that is reading
-    std::unique_ptr<detail::SampleAccount> mSamples; // the same, as far as samples go
-    std::unique_ptr<detail::GlobalSampler> mGlobals; // of the subtree that is being walked; null: none
+    std::string mFileName;                             // of the file that was loaded last; empty: none
+    std::unique_ptr<detail::MemoryAccount> mMemory;    // of the call that is reading
+    std::unique_ptr<detail::SampleAccount> mSamples;   // the same, as far as samples go
+    std::unique_ptr<detail::MeshInstances> mInstances; // that the call handed out
+    std::unique_ptr<detail::GlobalSampler> mGlobals;   // of the subtree that is being walked; null: none
     std::unique_ptr<detail::FrameTimes> mFrameTimes;
     bool mIsReading = false;
 };

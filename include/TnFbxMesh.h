@@ -5,21 +5,25 @@
 #pragma once
 
 #include "TnFbxExport.h"
+#include "TnFbxSharedArray.h"
 #include "TnFbxTransform.h"
-
-#include <vector>
 
 namespace Tarnell::Fbx {
 
 namespace detail {
 class MeshArrays;
-}
+class MeshInstances;
+} // namespace detail
 
 /// A polygon mesh.
 ///
 /// Polygons are runs of polygon vertices, one after the other; each polygon vertex names a control point and carries a
 /// normal, a texture coordinate and a colour of its own. Point j of set k is control point k × number of control
 /// points + j. Points are in centimetres where the mesh was read from a file.
+///
+/// Copies and assigned meshes share their arrays, and so do instances of one mesh that a read hands out, as far as they
+/// are equal. The first change of a shared array makes a copy of it, which takes memory; what others have stays as it
+/// is. Meshes that share belong to different threads as freely as those that do not.
 class TARNELL_FBX_API TnFbxMesh : public TnFbxTransform {
 public:
     /// A component of a new control point (P), normal (N), texture coordinate (U, V) or colour.
@@ -113,6 +117,7 @@ public:
 
 private:
     friend class detail::MeshArrays;
+    friend class detail::MeshInstances;
 
     struct Vector {
         float x, y, z;
@@ -124,13 +129,12 @@ private:
         float red, green, blue, alpha;
     };
     struct Geometry {
-        std::vector<int> polygonVertexSizes;
-        std::vector<int> pointIndices;
-        std::vector<Vector> controlPoints;
-        std::vector<Vector> normals;
-        std::vector<TextureCoordinate> uvs;
-        std::vector<Colour> colours;
-        // after the arrays: where a copy runs out of memory, the counts are still those of an empty mesh
+        detail::SharedArray<int> polygonVertexSizes;
+        detail::SharedArray<int> pointIndices;
+        detail::SharedArray<Vector> controlPoints;
+        detail::SharedArray<Vector> normals;
+        detail::SharedArray<TextureCoordinate> uvs;
+        detail::SharedArray<Colour> colours;
         int controlPointCount = 0; // of one set
         int controlPointSetCount = 0;
         bool validNormals = false;

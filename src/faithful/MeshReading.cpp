@@ -11,6 +11,7 @@
 
 #include "calls/LastError.h"
 #include "model/MeshArrays.h"
+#include "model/MeshInstances.h"
 
 #include <algorithm>
 #include <cmath>
@@ -28,6 +29,7 @@ namespace {
 
 using detail::Corner;
 using detail::MeshArrays;
+using detail::MeshInstances;
 using fbxsdk::FbxAMatrix;
 using fbxsdk::FbxMesh;
 using fbxsdk::FbxNode;
@@ -238,29 +240,35 @@ bool fillColours(FbxMesh& source, const FbxNode& node, const Corners& corners, M
     return found;
 }
 
-void fillMesh(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, std::int64_t cornerCount,
-              TnFbxMesh& mesh) {
+/// What layers say, in the layout that is filled, too, unless it is that of another node's mesh.
+void fillCorners(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, bool isAlike, MeshArrays& arrays,
+                 TnFbxMesh& mesh) {
     const Corners corners(source, placed.mirrored());
-    bool normals = false, uvs = false, colours = false;
-    {
-        MeshArrays arrays(mesh);
-        if (!arrays.allocate(source.GetPolygonCount(), static_cast<int>(placed.points().size()),
-                             static_cast<int>(cornerCount))) {
-            arrays.allocatePoints(static_cast<int>(placed.points().size()));
-        } else {
-            fillLayout(source, corners, arrays);
-            normals = fillNormals(source, corners, placed, arrays);
-            uvs = fillUVs(source, corners, arrays);
-            colours = fillColours(source, node, corners, arrays);
-        }
+    if (!isAlike) {
+        fillLayout(source, corners, arrays);
+    }
+    mesh.setValidNormals(fillNormals(source, corners, placed, arrays));
+    mesh.setValidUVs(isAlike ? mesh.getValidUVs() : fillUVs(source, corners, arrays));
+    mesh.setValidColours(fillColours(source, node, corners, arrays));
+}
+
+/// `alike` is what the mesh of another node with the same source became; null when there is none.
+void fillMesh(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, std::int64_t cornerCount,
+              const MeshInstances::Geometry* alike, TnFbxMesh& mesh) {
+    MeshArrays arrays(mesh);
+    if (alike != nullptr) {
+        arrays.allocateLike(*alike);
+    } else if (!arrays.allocate(source.GetPolygonCount(), static_cast<int>(placed.points().size()),
+                                static_cast<int>(cornerCount))) {
+        arrays.allocatePoints(static_cast<int>(placed.points().size()));
+    }
+    if (mesh.getNumberOfPolygons() > 0) {
+        fillCorners(source, node, placed, alike != nullptr, arrays, mesh);
     }
     for (std::size_t i = 0; i < placed.points().size(); ++i) {
         const FbxVector4& point = placed.points()[i];
         mesh.setControlPoint(static_cast<int>(i), toFloat(point[0]), toFloat(point[1]), toFloat(point[2]));
     }
-    mesh.setValidNormals(normals);
-    mesh.setValidUVs(uvs);
-    mesh.setValidColours(colours);
 }
 
 /// What the arrays of a mesh take: for each corner an index, a normal, a texture coordinate and a colour.
@@ -272,6 +280,18 @@ std::uint64_t bytesOf(const FbxMesh& source, std::int64_t cornerCount) {
            static_cast<std::uint64_t>(cornerCount) * perCorner;
 }
 
+/// The same for the mesh of one more node.
+std::uint64_t bytesOfAnother(const FbxMesh& source, std::int64_t cornerCount) {
+    return std::min(bytesOf(source, cornerCount),
+                    MeshArrays::bytesOfAnother(source.GetControlPointsCount(), cornerCount));
+}
+
+/// What was handed out for another node with the same mesh; null when nothing was, or nothing that fits.
+const MeshInstances::Geometry* findAlike(Scene& scene, const MeshInstances::Source& source, std::size_t pointCount) {
+    const MeshInstances::Geometry* found = scene.instances().find(source);
+    return found != nullptr && found->controlPoints.size() == pointCount ? found : nullptr;
+}
+
 } // namespace
 
 bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh& mesh) {
@@ -280,15 +300,27 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
     if (cornerCount > std::numeric_limits<int>::max()) {
         return detail::fail(scene.fileName() + ": the mesh of \"" + node.GetName() + "\" has too many corners");
     }
-    if (!scene.grantBytes(bytesOf(source, cornerCount)) ||
-        !readNode(scene, info, node, static_cast<TnFbxTransform&>(mesh))) {
+    // Whether the corners go the other way round shows later: there may be nothing alike after all.
+    const MeshInstances::Source straight = {&source, false}, reversed = {&source, true};
+    const bool isKnown = scene.instances().find(straight) != nullptr || scene.instances().find(reversed) != nullptr;
+    const std::uint64_t all = bytesOf(source, cornerCount);
+    const std::uint64_t granted = isKnown ? bytesOfAnother(source, cornerCount) : all;
+    if (!scene.grantBytes(granted) || !readNode(scene, info, node, static_cast<TnFbxTransform&>(mesh))) {
         return false;
     }
     const FbxTime time = scene.now();
     const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
+    const MeshInstances::Source& kept = placed.mirrored() ? reversed : straight;
+    const MeshInstances::Geometry* alike = findAlike(scene, kept, placed.points().size());
+    if (alike == nullptr && !scene.grantBytes(all - granted)) {
+        return false;
+    }
     try {
-        fillMesh(source, node, placed, cornerCount, mesh);
+        fillMesh(source, node, placed, cornerCount, alike, mesh);
         mesh.setPointsPlaced(info.getTransformPoints());
+        if (source.GetNodeCount() > 1) {
+            scene.giveBackBytes(scene.instances().keep(kept, mesh));
+        }
         return true;
     } catch (const std::runtime_error& error) { // what the platform says of a layer element without its array
         mesh.initMesh();
@@ -299,7 +331,10 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
 
 bool addPoints(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh& mesh) {
     FbxMesh& source = *node.GetMesh();
-    if (!scene.grantBytes(static_cast<std::uint64_t>(mesh.getNumberOfControlPoints()) * 3 * sizeof(float))) {
+    // Points that are shared so far become the mesh's own.
+    const int sets = 1 + (MeshArrays::sharesPoints(mesh) ? mesh.getNumberOfControlPointSets() : 0);
+    if (!scene.grantBytes(static_cast<std::uint64_t>(mesh.getNumberOfControlPoints()) * 3 * sizeof(float) *
+                          static_cast<std::uint64_t>(sets))) {
         return false;
     }
     const FbxTime time = scene.now();

@@ -8,6 +8,7 @@
 #include "TnFbxReadInfo.h"
 #include "access/TimeModeScope.h"
 #include "calls/MemoryLimit.h"
+#include "model/MeshInstances.h"
 
 #include <fbxsdk.h>
 
@@ -52,8 +53,14 @@ public:
     bool grantSamples(std::int64_t channels);
     /// The same for other bytes that are handed out.
     bool grantBytes(std::uint64_t bytes);
+    void giveBackBytes(std::uint64_t bytes) { mMemory.giveBack(bytes); }
     /// What was granted is no longer held.
-    void forgetMemory() { mMemory.begin(); }
+    void forgetMemory() {
+        mMemory.begin();
+        mInstances.forget();
+    }
+    /// The meshes among what was granted that have nodes in common.
+    detail::MeshInstances& instances() { return mInstances; }
 
 private:
     bool selectStack(const std::string& name);
@@ -72,6 +79,7 @@ private:
     float mFrame = 0.0f;
     fbxsdk::FbxTime mNow;
     detail::MemoryAccount mMemory;
+    detail::MeshInstances mInstances;
     std::unordered_map<const fbxsdk::FbxNode*, bool> mMoves;
 };
 

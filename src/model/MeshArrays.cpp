@@ -9,22 +9,23 @@ namespace Tarnell::Fbx::detail {
 namespace {
 
 template <typename Element>
-void reserveExactly(std::vector<Element>& array, int count) {
-    array.reserve(static_cast<std::size_t>(count));
+void reserveExactly(SharedArray<Element>& array, std::size_t count) {
+    array.own().reserve(count);
 }
 
 /// Elements up to a count that memory was reserved for; those that are there already stay.
 template <typename Element>
-Element* filled(std::vector<Element>& array, std::size_t count, const Element& value) {
-    array.resize(count, value);
-    return array.data();
+void fill(SharedArray<Element>& array, std::size_t count, const Element& value) {
+    if (array.size() < count) {
+        array.own().resize(count, value);
+    }
 }
 
 } // namespace
 
 MeshArrays::~MeshArrays() {
     if (mAllocated) {
-        completeWithDefaults();
+        complete();
     }
 }
 
@@ -39,25 +40,33 @@ std::uint64_t MeshArrays::bytesOf(std::int64_t polygons, std::int64_t controlPoi
            static_cast<std::uint64_t>(polygonVertices) * corner;
 }
 
+std::uint64_t MeshArrays::bytesOfAnother(std::int64_t controlPoints, std::int64_t polygonVertices) {
+    if (controlPoints < 1 || polygonVertices < 1) {
+        return 0;
+    }
+    constexpr std::size_t corner = sizeof(TnFbxMesh::Vector) + sizeof(TnFbxMesh::Colour);
+    return static_cast<std::uint64_t>(controlPoints) * sizeof(TnFbxMesh::Vector) +
+           static_cast<std::uint64_t>(polygonVertices) * corner;
+}
+
 bool MeshArrays::allocate(int polygons, int controlPoints, int polygonVertices) {
     mMesh.initMesh(); // kept: before the check, so that a failure leaves an empty mesh
     if (polygons < 1 || controlPoints < 1 || polygonVertices < 1) {
         return false;
     }
+    const auto polygonCount = static_cast<std::size_t>(polygons);
+    const auto cornerCount = static_cast<std::size_t>(polygonVertices);
     TnFbxMesh::Geometry& g = mMesh.mGeometry;
-    reserveExactly(g.polygonVertexSizes, polygons);
-    reserveExactly(g.pointIndices, polygonVertices);
-    reserveExactly(g.controlPoints, controlPoints);
-    reserveExactly(g.normals, polygonVertices);
-    reserveExactly(g.uvs, polygonVertices);
-    reserveExactly(g.colours, polygonVertices);
+    reserveExactly(g.polygonVertexSizes, polygonCount);
+    reserveExactly(g.pointIndices, cornerCount);
+    reserveExactly(g.controlPoints, static_cast<std::size_t>(controlPoints));
+    reserveExactly(g.normals, cornerCount);
+    reserveExactly(g.uvs, cornerCount);
+    reserveExactly(g.colours, cornerCount);
 
-    filled(g.polygonVertexSizes, static_cast<std::size_t>(polygons), 0);
-    filled(g.pointIndices, static_cast<std::size_t>(polygonVertices), 0);
-    filled(g.controlPoints, static_cast<std::size_t>(controlPoints),
-           {TnFbxMesh::kDefaultMeshPX, TnFbxMesh::kDefaultMeshPY, TnFbxMesh::kDefaultMeshPZ});
-    g.controlPointCount = controlPoints;
-    g.controlPointSetCount = 1;
+    fill(g.polygonVertexSizes, polygonCount, 0);
+    fill(g.pointIndices, cornerCount, 0);
+    addFirstSet(controlPoints);
     mAllocated = true;
     return true;
 }
@@ -65,27 +74,49 @@ bool MeshArrays::allocate(int polygons, int controlPoints, int polygonVertices) 
 void MeshArrays::allocatePoints(int controlPoints) {
     mMesh.initMesh();
     if (controlPoints > 0) {
-        TnFbxMesh::Geometry& g = mMesh.mGeometry;
-        filled(g.controlPoints, static_cast<std::size_t>(controlPoints),
-               {TnFbxMesh::kDefaultMeshPX, TnFbxMesh::kDefaultMeshPY, TnFbxMesh::kDefaultMeshPZ});
-        g.controlPointCount = controlPoints;
-        g.controlPointSetCount = 1;
+        addFirstSet(controlPoints);
     }
+}
+
+void MeshArrays::allocateLike(const TnFbxMesh::Geometry& other) {
+    mMesh.initMesh();
+    TnFbxMesh::Geometry like = other;
+    like.normals = {};
+    like.colours = {};
+    like.controlPoints = {};
+    reserveExactly(like.normals, like.pointIndices.size());
+    reserveExactly(like.colours, like.pointIndices.size());
+    reserveExactly(like.controlPoints, static_cast<std::size_t>(like.controlPointCount));
+    mMesh.mGeometry = like;
+    addFirstSet(other.controlPointCount);
+    mAllocated = true;
+}
+
+void MeshArrays::addFirstSet(int controlPoints) {
+    fill(mMesh.mGeometry.controlPoints, static_cast<std::size_t>(controlPoints),
+         {TnFbxMesh::kDefaultMeshPX, TnFbxMesh::kDefaultMeshPY, TnFbxMesh::kDefaultMeshPZ});
+    mMesh.mGeometry.controlPointCount = controlPoints;
+    mMesh.mGeometry.controlPointSetCount = 1;
 }
 
 std::size_t MeshArrays::polygonVertexCount() const { return mMesh.mGeometry.pointIndices.size(); }
 
-void MeshArrays::completeWithDefaults() {
-    filled(mMesh.mGeometry.normals, polygonVertexCount(),
-           {TnFbxMesh::kDefaultMeshNX, TnFbxMesh::kDefaultMeshNY, TnFbxMesh::kDefaultMeshNZ});
-    filled(mMesh.mGeometry.uvs, polygonVertexCount(), {TnFbxMesh::kDefaultMeshU, TnFbxMesh::kDefaultMeshV});
-    colours();
+void MeshArrays::complete() {
+    fill(mMesh.mGeometry.normals, polygonVertexCount(),
+         {TnFbxMesh::kDefaultMeshNX, TnFbxMesh::kDefaultMeshNY, TnFbxMesh::kDefaultMeshNZ});
+    fill(mMesh.mGeometry.uvs, polygonVertexCount(), {TnFbxMesh::kDefaultMeshU, TnFbxMesh::kDefaultMeshV});
+    completeColours();
+}
+
+void MeshArrays::completeColours() {
+    fill(mMesh.mGeometry.colours, polygonVertexCount(),
+         {TnFbxMesh::kDefaultMeshRed, TnFbxMesh::kDefaultMeshGreen, TnFbxMesh::kDefaultMeshBlue,
+          TnFbxMesh::kDefaultMeshAlpha});
 }
 
 TnFbxMesh::Colour* MeshArrays::colours() {
-    return filled(mMesh.mGeometry.colours, polygonVertexCount(),
-                  {TnFbxMesh::kDefaultMeshRed, TnFbxMesh::kDefaultMeshGreen, TnFbxMesh::kDefaultMeshBlue,
-                   TnFbxMesh::kDefaultMeshAlpha});
+    completeColours();
+    return mMesh.mGeometry.colours.own().data();
 }
 
 } // namespace Tarnell::Fbx::detail

@@ -8,7 +8,6 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <vector>
 
 namespace Tarnell::Fbx::detail {
 
@@ -23,26 +22,40 @@ public:
 
     /// What a mesh of one set of points takes. Nothing where a count is below 1.
     static std::uint64_t bytesOf(std::int64_t polygons, std::int64_t controlPoints, std::int64_t polygonVertices);
+    /// What it takes of its own at most where another one has the same polygons and texture coordinates.
+    static std::uint64_t bytesOfAnother(std::int64_t controlPoints, std::int64_t polygonVertices);
+
+    /// Whether other meshes have the same points, in the same memory.
+    static bool sharesPoints(const TnFbxMesh& mesh) { return mesh.mGeometry.controlPoints.isShared(); }
 
     /// To be called first; the mesh is initialised. False when a number is below 1; the mesh is empty then and no array
     /// may be asked for.
     bool allocate(int polygons, int controlPoints, int polygonVertices);
     /// Instead: points that no polygon uses.
     void allocatePoints(int controlPoints);
+    /// Instead: the polygons, the texture coordinates and the flags of another mesh, with points, normals and colours
+    /// of its own.
+    void allocateLike(const TnFbxMesh::Geometry& other);
 
     // Each holds as many elements as it has to, defaults at first.
-    int* polygonVertexSizes() { return mMesh.mGeometry.polygonVertexSizes.data(); }
-    int* pointIndices() { return mMesh.mGeometry.pointIndices.data(); }
+    int* polygonVertexSizes() { return mMesh.mGeometry.polygonVertexSizes.own().data(); }
+    int* pointIndices() { return mMesh.mGeometry.pointIndices.own().data(); }
+    const int* polygonVertexSizes() const { return mMesh.mGeometry.polygonVertexSizes.data(); }
+    const int* pointIndices() const { return mMesh.mGeometry.pointIndices.data(); }
     TnFbxMesh::Colour* colours();
 
     // Of the polygon vertices in order, from the first one on, as many as there are at most. Those that are not added
     // have the defaults in the end.
-    void addNormal(const TnFbxMesh::Vector& normal) { mMesh.mGeometry.normals.push_back(normal); }
-    void addUV(const TnFbxMesh::TextureCoordinate& uv) { mMesh.mGeometry.uvs.push_back(uv); }
+    void addNormal(const TnFbxMesh::Vector& normal) { mMesh.mGeometry.normals.own().push_back(normal); }
+    void addUV(const TnFbxMesh::TextureCoordinate& uv) { mMesh.mGeometry.uvs.own().push_back(uv); }
+
+    /// What the destructor does: defaults for all that was not asked for or added.
+    void complete();
 
 private:
     std::size_t polygonVertexCount() const;
-    void completeWithDefaults();
+    void addFirstSet(int controlPoints);
+    void completeColours();
 
     TnFbxMesh& mMesh;
     bool mAllocated = false;

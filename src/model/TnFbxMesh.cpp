@@ -12,29 +12,30 @@ namespace Tarnell::Fbx {
 
 namespace {
 
+using detail::SharedArray;
+
 template <typename Element>
-int lengthOf(const std::vector<Element>& array) {
+int lengthOf(const SharedArray<Element>& array) {
     return static_cast<int>(array.size());
 }
 
 /// The element at an index, null when there is none.
-template <typename Array>
-auto elementAt(Array& array, int index) -> decltype(array.data()) {
-    return index >= 0 && index < lengthOf(array) ? &array[static_cast<std::size_t>(index)] : nullptr;
+template <typename Element>
+const Element* elementAt(const SharedArray<Element>& array, int index) {
+    return index >= 0 && index < lengthOf(array) ? array.data() + index : nullptr;
 }
 
 template <typename Element>
-bool setElement(std::vector<Element>& array, int index, const Element& value) {
-    Element* element = elementAt(array, index);
-    if (element == nullptr) {
+bool setElement(SharedArray<Element>& array, int index, const Element& value) {
+    if (index < 0 || index >= lengthOf(array)) {
         return false;
     }
-    *element = value;
+    array.own()[static_cast<std::size_t>(index)] = value;
     return true;
 }
 
 template <typename Vector>
-bool getVector(const std::vector<Vector>& array, int index, float& x, float& y, float& z) {
+bool getVector(const SharedArray<Vector>& array, int index, float& x, float& y, float& z) {
     const Vector* vector = elementAt(array, index);
     if (vector == nullptr) {
         return false;
@@ -80,7 +81,7 @@ bool TnFbxMesh::allocateGeometryData(int numberOfPolygons, int numberOfControlPo
 }
 
 bool TnFbxMesh::addControlPoint(float x, float y, float z) {
-    mGeometry.controlPoints.push_back({x, y, z});
+    mGeometry.controlPoints.own().push_back({x, y, z});
     return true;
 }
 

@@ -11,6 +11,7 @@
 #include "calls/MemoryLimit.h"
 
 #include "model/MeshArrays.h"
+#include "model/MeshInstances.h"
 
 #include <array>
 #include <limits>
@@ -85,7 +86,7 @@ void fillLayout(const fbxsdk::FbxMesh& source, MeshArrays& arrays) {
 
 /// Calls `visit(corner)` for every vertex of every polygon, in order. The layout must be filled.
 template <class Visit>
-void forEachCorner(MeshArrays& arrays, int polygonCount, Visit&& visit) {
+void forEachCorner(const MeshArrays& arrays, int polygonCount, Visit&& visit) {
     const int* const sizes = arrays.polygonVertexSizes();
     const int* const pointIndices = arrays.pointIndices();
     int polygonVertex = 0;
@@ -160,6 +161,24 @@ bool fillColours(fbxsdk::FbxMesh& source, MeshArrays& arrays) {
     return found;
 }
 
+/// All that layers say, in the layout that is filled, too, unless it is that of another node's mesh.
+void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, bool isAlike, MeshArrays& arrays,
+                 TnFbxMesh& mesh) {
+    if (!isAlike) {
+        fillLayout(source, arrays);
+    }
+    bool normals = false, uvs = isAlike && mesh.getValidUVs();
+    if (fbxsdk::FbxLayer* first = source.GetLayer(0)) {
+        normals = fillNormals(source, *first, bake, arrays);
+        uvs = isAlike ? uvs : fillUVs(source, *first, arrays);
+    }
+    const bool colours = fillColours(source, arrays);
+    // At the end: of a mesh that a damaged layer left partly filled, nothing is valid.
+    mesh.setValidNormals(normals);
+    mesh.setValidUVs(uvs);
+    mesh.setValidColours(colours);
+}
+
 } // namespace
 
 bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
@@ -177,29 +196,32 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
     const fbxsdk::FbxAMatrix* pointBake = transformPoints ? &bake.points : nullptr;
     const fbxsdk::FbxAMatrix* normalBake = transformPoints ? &bake.normals : nullptr;
 
+    const detail::MeshInstances::Source instanced = {source, /*isReversed*/ false};
+    const bool isInstance = source->GetNodeCount() > 1;
     MeshArrays arrays(mesh);
     const std::int64_t cornerCount = polygonVertexCount(*source);
     // What there is no room for is counted only, and makes the call fail.
-    if (!mMemory->take(MeshArrays::bytesOf(source->GetPolygonCount(), source->GetControlPointsCount(), cornerCount))) {
+    const bool isFirst = !isInstance || mInstances->isFirst(instanced);
+    if (!mMemory->take(
+            isFirst ? MeshArrays::bytesOf(source->GetPolygonCount(), source->GetControlPointsCount(), cornerCount)
+                    : MeshArrays::bytesOfAnother(source->GetControlPointsCount(), cornerCount))) {
         mesh.initMesh();
         return scope.finish(succeed());
     }
-    if (cornerCount > std::numeric_limits<int>::max() ||
-        !arrays.allocate(source->GetPolygonCount(), source->GetControlPointsCount(), static_cast<int>(cornerCount))) {
+    const auto* alike = isFirst ? nullptr : mInstances->find(instanced);
+    if (alike != nullptr) {
+        arrays.allocateLike(*alike);
+    } else if (cornerCount > std::numeric_limits<int>::max() ||
+               !arrays.allocate(source->GetPolygonCount(), source->GetControlPointsCount(),
+                                static_cast<int>(cornerCount))) {
         return fail(std::string("the mesh of \"") + node->GetName() + "\" has no polygons or no points");
     }
     setControlPoints(time, *node, *source, pointBake, mesh);
-    fillLayout(*source, arrays);
-    bool normals = false, uvs = false;
-    if (fbxsdk::FbxLayer* first = source->GetLayer(0)) {
-        normals = fillNormals(*source, *first, normalBake, arrays);
-        uvs = fillUVs(*source, *first, arrays);
+    fillCorners(*source, normalBake, alike != nullptr, arrays, mesh);
+    if (isInstance) {
+        arrays.complete();
+        mMemory->giveBack(mInstances->keep(instanced, mesh));
     }
-    const bool colours = fillColours(*source, arrays);
-    // At the end: of a mesh that a damaged layer left partly filled, nothing is valid.
-    mesh.setValidNormals(normals);
-    mesh.setValidUVs(uvs);
-    mesh.setValidColours(colours);
     return scope.finish(succeed());
 }
 

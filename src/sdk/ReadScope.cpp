@@ -5,6 +5,7 @@
 #include "SampleAccount.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
+#include "model/MeshInstances.h"
 
 #include <utility>
 
@@ -23,6 +24,7 @@ ReadScope::~ReadScope() {
     if (mIsOutermost) {
         mSdk.mIsReading = false;
         mSdk.mMemory->end();
+        mSdk.mInstances->forget();
     }
 }
 

@@ -17,6 +17,7 @@
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 #include "model/FrameArithmetic.h"
+#include "model/MeshInstances.h"
 
 namespace Tarnell::Fbx {
 
@@ -70,7 +71,7 @@ void evaluateStack(fbxsdk::FbxScene& scene, fbxsdk::FbxAnimStack* stack) {
 
 FbxSdk::FbxSdk()
     : mMemory(std::make_unique<detail::MemoryAccount>()), mSamples(std::make_unique<detail::SampleAccount>(*mMemory)),
-      mFrameTimes(std::make_unique<detail::FrameTimes>()) {}
+      mInstances(std::make_unique<detail::MeshInstances>()), mFrameTimes(std::make_unique<detail::FrameTimes>()) {}
 
 FbxSdk::~FbxSdk() {
     mInitialized = false;

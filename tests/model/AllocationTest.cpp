@@ -198,6 +198,38 @@ TEST(Allocation, ClearingAMeshKeepsItsMemory) {
               0u);
 }
 
+TEST(Allocation, CopiesOfAMeshShareItsArraysUntilOneIsChanged) {
+    TnFbxMesh mesh;
+    mesh.allocateGeometryData(100, 100, 300);
+    TnFbxMesh copy;
+
+    EXPECT_EQ(allocationsOf([&] { copy = mesh; }), 0u);
+    EXPECT_EQ(allocationsOf([&] { copy.setValidNormals(true); }), 0u);
+    EXPECT_EQ(allocationsOf([&] { copy.setControlPoint(0, 1.0f, 2.0f, 3.0f); }), 2u) << "one array alone";
+    EXPECT_EQ(allocationsOf([&] { copy.setControlPoint(1, 1.0f, 2.0f, 3.0f); }), 0u) << "which is its own now";
+    mesh.deleteMesh();
+    EXPECT_EQ(allocationsOf([&] { copy.setNormal(0, 1.0f, 2.0f, 3.0f); }), 0u) << "that nobody else has any more";
+}
+
+TEST(Allocation, AChangeOfASharedArrayWithoutMemoryThrowsAndChangesNothing) {
+    TnFbxMesh mesh;
+    mesh.allocateGeometryData(1, 2000000, 3);
+    mesh.setControlPoint(5, 1.0f, 2.0f, 3.0f);
+    TnFbxMesh copy(mesh);
+    const AllocationLimit limit(kSixteenMegabytes);
+
+    EXPECT_THROW(copy.setControlPoint(5, 0.0f, 0.0f, 0.0f), std::bad_alloc);
+    EXPECT_THROW(copy.addControlPoint(0.0f, 0.0f, 0.0f), std::bad_alloc);
+
+    EXPECT_EQ(copy.getNumberOfControlPoints(), 2000000);
+    for (const TnFbxMesh* each : {&mesh, &copy}) {
+        float x = 0.0f, y = 0.0f, z = 0.0f;
+        ASSERT_TRUE(each->getControlPoint(5, x, y, z));
+        EXPECT_EQ(z, 3.0f);
+        EXPECT_FALSE(each->getControlPoint(2000000, x, y, z));
+    }
+}
+
 TEST(Allocation, AMeshWithoutMemoryThrowsAndIsEmpty) {
     TnFbxMesh mesh;
     mesh.allocateGeometryData(2, 4, 6);
@@ -217,18 +249,17 @@ TEST(Allocation, AMeshWithoutMemoryThrowsAndIsEmpty) {
     }
 }
 
-TEST(Allocation, AMeshCopiedWithoutMemoryHasNoPointsToItsName) {
+TEST(Allocation, AMeshIsAssignedWithoutMemory) {
     TnFbxMesh source;
-    source.allocateGeometryData(1, 1, 1200000); // indices and uvs fit into the limit, colours do not
+    source.allocateGeometryData(1, 1, 1200000);
     TnFbxMesh target;
     target.allocateGeometryData(2, 4, 6);
-    const AllocationLimit limit(kSixteenMegabytes);
+    const AllocationLimit limit(0);
 
-    EXPECT_THROW(target = source, std::bad_alloc);
+    target = source;
 
-    EXPECT_EQ(target.getNumberOfControlPoints(), 0);
-    EXPECT_EQ(target.getNumberOfControlPointSets(), 0);
-    EXPECT_FALSE(target.getValidColours());
+    EXPECT_EQ(target.getNumberOfControlPoints(), 1);
+    EXPECT_EQ(target.getNumberOfPolygonVertices(), 1200000);
 }
 
 } // namespace

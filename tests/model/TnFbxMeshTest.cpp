@@ -363,5 +363,51 @@ TEST(TnFbxMesh, ACopyHasTheGeometryTheTransformAndTheName) {
     expectMarkedTransform(copy, "mesh", 5.0f);
 }
 
+/// Changes every array, and adds a point.
+void changeEverywhere(TnFbxMesh& mesh) {
+    EXPECT_TRUE(mesh.setPolygonVertexSize(0, 77));
+    EXPECT_TRUE(mesh.setPointIndex(0, 77));
+    EXPECT_TRUE(mesh.setControlPoint(0, 7.0f, 7.0f, 7.0f));
+    EXPECT_TRUE(mesh.addControlPoint(8.0f, 8.0f, 8.0f));
+    EXPECT_TRUE(mesh.setNormal(0, 7.0f, 7.0f, 7.0f));
+    EXPECT_TRUE(mesh.setUV(0, 7.0f, 7.0f));
+    EXPECT_TRUE(mesh.setColour(0, 7.0f, 7.0f, 7.0f, 7.0f));
+}
+
+TEST(TnFbxMesh, ChangingACopyLeavesTheOriginalAsItWas) {
+    const TnFbxMesh source = filledMesh();
+    TnFbxMesh copy(source);
+    TnFbxMesh assigned;
+    assigned = copy;
+
+    changeEverywhere(copy);
+
+    expectFilled(source);
+    expectFilled(assigned);
+    EXPECT_EQ(controlPoint(source, 4), kRejected);
+    EXPECT_EQ(copy.getPolygonVertexSize(0), 77);
+    EXPECT_EQ(copy.getPointIndex(0), 77);
+    EXPECT_EQ(controlPoint(copy, 0), three(7.0f, 7.0f, 7.0f));
+    EXPECT_EQ(controlPoint(copy, 1), three(1.0f, 1.25f, 1.5f));
+    EXPECT_EQ(controlPoint(copy, 4), three(8.0f, 8.0f, 8.0f));
+    EXPECT_EQ(normal(copy, 0), three(7.0f, 7.0f, 7.0f));
+    EXPECT_EQ(uv(copy, 0), two(7.0f, 7.0f));
+    EXPECT_EQ(colour(copy, 0), (Values{7.0f, 7.0f, 7.0f, 7.0f}));
+}
+
+TEST(TnFbxMesh, EmptyingOrAllocatingTheOriginalLeavesACopyAsItWas) {
+    TnFbxMesh source = filledMesh();
+    const TnFbxMesh copy(source);
+
+    source.deleteMesh();
+    expectFilled(copy);
+    source = copy;
+    source.allocateGeometryData(1, 2, 3);
+
+    expectFilled(copy);
+    EXPECT_EQ(source.getNumberOfPolygonVertices(), 3);
+    EXPECT_EQ(normal(source, 2), three(0.0f, 0.0f, 0.0f));
+}
+
 } // namespace
 } // namespace Tarnell::Fbx

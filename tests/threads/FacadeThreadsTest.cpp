@@ -13,6 +13,7 @@
 #include <algorithm>
 #include <string>
 #include <thread>
+#include <vector>
 
 namespace Tarnell::Fbx {
 namespace {
@@ -140,6 +141,31 @@ TEST(FacadeThreads, WriteTheArraysOfALargeMeshAtTheSameTime) {
         ASSERT_EQ(y, static_cast<float>(at % 4));
         ASSERT_TRUE(back.getColour(at, x, y, z, w));
         ASSERT_EQ(y, 0.5f);
+    }
+}
+
+TEST(FacadeThreads, ChangeCopiesOfOneMesh) {
+    TnFbxMesh mesh;
+    fillStrip(mesh, 100);
+    std::vector<TnFbxMesh> copies(kThreads, mesh);
+
+    onAllThreads([&copies](int thread) {
+        TnFbxMesh& own = copies[static_cast<std::size_t>(thread)];
+        const TnFbxMesh passing(own);
+        for (int i = 0; i < own.getNumberOfControlPoints(); ++i) {
+            float x = 0.0f, y = 0.0f, z = 0.0f;
+            EXPECT_TRUE(passing.getControlPoint(i, x, y, z));
+            EXPECT_TRUE(own.setControlPoint(i, x, y, static_cast<float>(thread + 1)));
+        }
+    });
+
+    for (int thread = 0; thread < kThreads; ++thread) {
+        float x = 0.0f, y = 0.0f, z = 0.0f;
+        ASSERT_TRUE(copies[static_cast<std::size_t>(thread)].getControlPoint(3, x, y, z));
+        EXPECT_EQ(x, 1.0f);
+        EXPECT_EQ(z, static_cast<float>(thread + 1));
+        ASSERT_TRUE(mesh.getControlPoint(3, x, y, z));
+        EXPECT_EQ(z, 0.0f);
     }
 }
 
