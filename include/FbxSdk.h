@@ -421,7 +421,8 @@ private:
     std::string mFileName;                             // of the file that was loaded last; empty: none
     std::unique_ptr<detail::MemoryAccount> mMemory;    // of the call that is reading
     std::unique_ptr<detail::SampleAccount> mSamples;   // the same, as far as samples go
-    std::unique_ptr<detail::MeshInstances> mInstances; // that the call handed out
+    std::unique_ptr<detail::ObjectWarnings> mWarnings; // of it
+    std::unique_ptr<detail::MeshInstances> mInstances; // that it handed out
     std::unique_ptr<detail::GlobalSampler> mGlobals;   // of the subtree that is being walked; null: none
     std::unique_ptr<detail::FrameTimes> mFrameTimes;
     bool mIsReading = false;

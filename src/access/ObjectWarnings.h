@@ -16,6 +16,7 @@ public:
     void add(const std::string& object, const std::string& fault);
     /// Hands one sentence per fault to `lastWarnings()`.
     void report() const;
+    void forget() { mRows.clear(); }
 
 private:
     struct Row {

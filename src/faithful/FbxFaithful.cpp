@@ -67,7 +67,10 @@ template <class Object>
 bool FbxFaithful::read(fbxsdk::FbxNode& node, Object& object) {
     return call(mFile->info, [&] {
         object.setName(node.GetName());
-        return faithful::readNode(mFile->scene, mFile->info, node, object);
+        const bool isRead = faithful::readNode(mFile->scene, mFile->info, node, object);
+        mFile->scene.warnings().report();
+        mFile->scene.warnings().forget();
+        return isRead;
     });
 }
 

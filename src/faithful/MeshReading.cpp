@@ -9,6 +9,7 @@
 #include "Reading.h"
 #include "Sampling.h"
 
+#include "access/CornerWarnings.h"
 #include "calls/LastError.h"
 #include "model/MeshArrays.h"
 #include "model/MeshInstances.h"
@@ -300,6 +301,7 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
     if (cornerCount > std::numeric_limits<int>::max()) {
         return detail::fail(scene.fileName() + ": the mesh of \"" + node.GetName() + "\" has too many corners");
     }
+    detail::noteRepairedCorners(scene.fileName(), node, source, scene.warnings());
     // Whether the corners go the other way round shows later: there may be nothing alike after all.
     const MeshInstances::Source straight = {&source, false}, reversed = {&source, true};
     const bool isKnown = scene.instances().find(straight) != nullptr || scene.instances().find(reversed) != nullptr;

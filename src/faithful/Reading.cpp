@@ -113,6 +113,8 @@ bool readObjects(Scene& scene, const TnFbxReadInfo& info, Object** objects, int&
             return false;
         }
     }
+    scene.warnings().report();
+    scene.warnings().forget();
     return detail::succeed();
 }
 

@@ -6,6 +6,7 @@
 
 #include "Timeline.h"
 #include "TnFbxReadInfo.h"
+#include "access/ObjectWarnings.h"
 #include "access/TimeModeScope.h"
 #include "calls/MemoryLimit.h"
 #include "model/MeshInstances.h"
@@ -61,6 +62,8 @@ public:
     }
     /// The meshes among what was granted that have nodes in common.
     detail::MeshInstances& instances() { return mInstances; }
+    /// About nodes, for who reads them to report.
+    detail::ObjectWarnings& warnings() { return mWarnings; }
 
 private:
     bool selectStack(const std::string& name);
@@ -80,6 +83,7 @@ private:
     fbxsdk::FbxTime mNow;
     detail::MemoryAccount mMemory;
     detail::MeshInstances mInstances;
+    detail::ObjectWarnings mWarnings;
     std::unordered_map<const fbxsdk::FbxNode*, bool> mMoves;
 };
 

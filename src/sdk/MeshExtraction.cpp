@@ -7,6 +7,7 @@
 #include "LayerReading.h"
 #include "PropertySampling.h"
 #include "ReadScope.h"
+#include "access/CornerWarnings.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 
@@ -198,6 +199,7 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
 
     const detail::MeshInstances::Source instanced = {source, /*isReversed*/ false};
     const bool isInstance = source->GetNodeCount() > 1;
+    detail::noteRepairedCorners(mFileName, *node, *source, *mWarnings);
     MeshArrays arrays(mesh);
     const std::int64_t cornerCount = polygonVertexCount(*source);
     // What there is no room for is counted only, and makes the call fail.

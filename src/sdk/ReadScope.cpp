@@ -3,6 +3,7 @@
 #include "ReadScope.h"
 
 #include "SampleAccount.h"
+#include "access/ObjectWarnings.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 #include "model/MeshInstances.h"
@@ -17,6 +18,7 @@ ReadScope::ReadScope(FbxSdk& sdk) : mSdk(sdk), mIsOutermost(!std::exchange(sdk.m
     if (mIsOutermost) {
         sdk.mMemory->begin();
         sdk.mSamples->begin();
+        sdk.mWarnings->forget();
     }
 }
 
@@ -29,6 +31,9 @@ ReadScope::~ReadScope() {
 }
 
 bool ReadScope::finish(bool result) const {
+    if (mIsOutermost) {
+        mSdk.mWarnings->report();
+    }
     if (!mIsOutermost || !result || !mSdk.mMemory->exceeded()) {
         return result;
     }

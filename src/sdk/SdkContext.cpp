@@ -13,6 +13,7 @@
 #include "access/FileWarnings.h"
 #include "access/NodeWalk.h"
 #include "access/Normalisation.h"
+#include "access/ObjectWarnings.h"
 #include "access/TimeModeScope.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
@@ -71,7 +72,8 @@ void evaluateStack(fbxsdk::FbxScene& scene, fbxsdk::FbxAnimStack* stack) {
 
 FbxSdk::FbxSdk()
     : mMemory(std::make_unique<detail::MemoryAccount>()), mSamples(std::make_unique<detail::SampleAccount>(*mMemory)),
-      mInstances(std::make_unique<detail::MeshInstances>()), mFrameTimes(std::make_unique<detail::FrameTimes>()) {}
+      mWarnings(std::make_unique<detail::ObjectWarnings>()), mInstances(std::make_unique<detail::MeshInstances>()),
+      mFrameTimes(std::make_unique<detail::FrameTimes>()) {}
 
 FbxSdk::~FbxSdk() {
     mInitialized = false;

@@ -12,6 +12,7 @@
 #include <gmock/gmock.h>
 
 #include <filesystem>
+#include <memory>
 #include <string>
 
 namespace Tarnell::Fbx {
@@ -105,6 +106,65 @@ TEST(ReadWarnings, NameSurfacesThatAreCountedButNotRead) {
     EXPECT_TRUE(scene.sdk.getTransforms(info, &transform, 1));
     EXPECT_THAT(lastWarnings(), IsEmpty());
 }
+
+/// Two meshes with the same geometry, whose last corner names the eighth of three points; or there are none.
+std::string cornersBeyondThePoints(bool hasPoints) {
+    const std::string points = hasPoints ? "Vertices: *9 {\na: 1,0,0,2,0,0,3,1,0\n}\n" : "";
+    return "; FBX 7.4.0 project file\nFBXHeaderExtension: {\nFBXVersion: 7400\n}\nObjects: {\n"
+           "Geometry: 10, \"Geometry::\", \"Mesh\" {\n" +
+           points +
+           "PolygonVertexIndex: *3 {\na: 1,2,-8\n}\n}\n"
+           "Model: 1, \"Model::one\", \"Mesh\" {\n}\nModel: 2, \"Model::two\", \"Mesh\" {\n}\n}\n"
+           "Connections: {\nC: \"OO\",1,0\nC: \"OO\",2,0\nC: \"OO\",10,1\nC: \"OO\",10,2\n}\n";
+}
+
+class CornersBeyondThePoints : public testing::TestWithParam<EFbxFidelity> {
+protected:
+    std::string write(bool hasPoints) { return mFolder.write("corners.fbx", cornersBeyondThePoints(hasPoints)); }
+    static TnFbxReadInfo info(const std::string& file) {
+        TnFbxReadInfo info = localRead(file);
+        info.setFidelity(GetParam());
+        if (GetParam() == kFbxFidelityFaithful) {
+            info.setAnimationStackName("");
+        }
+        return info;
+    }
+
+private:
+    support::TemporaryFolder mFolder;
+};
+
+TEST_P(CornersBeyondThePoints, AreReadAsTheFirstPointWithAWarning) {
+    const std::string file = write(/*hasPoints*/ true);
+    FacadeRead<TnFbxMesh> meshes(info(file));
+
+    ASSERT_EQ(meshes.count, 2);
+    EXPECT_EQ(meshes["one"].getPointIndex(1), 2);
+    EXPECT_EQ(meshes["one"].getPointIndex(2), 0);
+    EXPECT_EQ(meshes["two"].getPointIndex(2), 0);
+    EXPECT_THAT(lastWarnings(),
+                testing::ElementsAre(file + ": \"one\" and 1 more: corners of polygons name points that there "
+                                            "are not, and are read as point 0"));
+}
+
+TEST_P(CornersBeyondThePoints, AreSaidToBeLeftOutWhereThereIsNoPoint) {
+    const std::string file = write(/*hasPoints*/ false);
+    TnFbxReadInfo options = info(file);
+    TnFbxMesh* meshes = nullptr;
+    int count = 0;
+
+    static_cast<void>(Fbx().getMeshes(options, &meshes, count));
+
+    const std::unique_ptr<TnFbxMesh[]> owner(meshes);
+    EXPECT_THAT(lastWarnings(),
+                Contains(file + ": \"one\" and 1 more: the polygons name points, and there are none; they are "
+                                "left out"));
+}
+
+INSTANTIATE_TEST_SUITE_P(BothFidelities, CornersBeyondThePoints,
+                         testing::Values(kFbxFidelityCompatible, kFbxFidelityFaithful), [](const auto& param) {
+                             return param.param == kFbxFidelityFaithful ? "Faithful" : "Compatible";
+                         });
 
 } // namespace
 } // namespace Tarnell::Fbx

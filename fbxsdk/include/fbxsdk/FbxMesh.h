@@ -68,6 +68,13 @@ public:
     void ReservePolygonCount(int pCount);
     void ReservePolygonVertexCount(int pCount);
 
+    /// Of the corners in the file, those that named points that there are not: they are at point 0 or, in a mesh
+    /// without points, left out. 0 for a mesh that is not from a file.
+    [[nodiscard]] int GetRepairedCornerCount() const {
+        ensureLoaded();
+        return mRepairedCorners;
+    }
+
     /// The platform's own view: the polygons as they are, without asking the file.
     [[nodiscard]] detail::PlainArray<int>& polygonVertices() { return mPolygonVertices; }
     [[nodiscard]] detail::PlainArray<int>& polygonStarts() { return mPolygonStarts; }
@@ -94,6 +101,7 @@ private:
     detail::PlainArray<int> mPolygonStarts;
     detail::PlainArray<int> mEdges;
     std::unique_ptr<detail::ElementSource> mEdgeSource;
+    int mRepairedCorners = 0;
     bool mPolygonOpen = false;
 };
 

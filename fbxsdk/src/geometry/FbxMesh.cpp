@@ -52,7 +52,7 @@ FbxNodeAttribute::EType FbxMesh::GetAttributeType() const { return eMesh; }
 bool FbxMesh::readSource(const detail::GeometrySource& pSource) {
     if (pSource.surface)
         return detail::fillMesh(*this, *pSource.surface);
-    detail::readMesh(*this, pSource);
+    mRepairedCorners = detail::readMesh(*this, pSource);
     detail::readLayers(*this, pSource);
     if (const detail::Record* edges = pSource.body->child("Edges"))
         mEdgeSource.reset(new detail::ElementSource{pSource.document, nullptr, edges});

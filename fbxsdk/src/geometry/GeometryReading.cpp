@@ -22,10 +22,13 @@ int countPolygons(const PlainArray<int>& corners) {
 
 /// Corners come as in files: a negative entry is the last corner of its polygon, all bits inverted. A last polygon that
 /// is never closed ends with the list. Corners at points that do not exist go to point 0; when there are no points,
-/// there can be no polygons.
-void cutIntoPolygons(PlainArray<int>& corners, PlainArray<int>& starts, int pointCount) {
-    if (pointCount == 0)
+/// there can be no polygons. How many there were of them.
+int cutIntoPolygons(PlainArray<int>& corners, PlainArray<int>& starts, int pointCount) {
+    int repaired = 0;
+    if (pointCount == 0) {
+        repaired = corners.count();
         corners.clear();
+    }
     starts.resizeUninitialised(countPolygons(corners));
     const int count = corners.count();
     int* const cornerList = corners.data();
@@ -34,11 +37,13 @@ void cutIntoPolygons(PlainArray<int>& corners, PlainArray<int>& starts, int poin
     for (int i = 0; i < count; ++i) {
         const int stored = cornerList[i];
         const int corner = stored < 0 ? ~stored : stored;
+        repaired += corner < pointCount ? 0 : 1;
         cornerList[i] = corner < pointCount ? corner : 0;
         if (atStart)
             *start++ = i;
         atStart = stored < 0;
     }
+    return repaired;
 }
 
 /// Adds offsets, three numbers each, to the points that the indices name; without indices to the first points in order.
@@ -63,13 +68,14 @@ void attachSource(FbxGeometryBase& geometry, const std::shared_ptr<const Documen
     geometry.setSource(std::make_unique<GeometrySource>(GeometrySource{document, object.body}));
 }
 
-void readMesh(FbxMesh& mesh, const GeometrySource& source) {
+int readMesh(FbxMesh& mesh, const GeometrySource& source) {
     if (const Record* vertices = source.body->child("Vertices"))
         fetchItems(*source.document, *vertices, mesh.points());
-    if (const Record* polygons = source.body->child("PolygonVertexIndex")) {
-        readItems(*polygons, mesh.polygonVertices());
-        cutIntoPolygons(mesh.polygonVertices(), mesh.polygonStarts(), mesh.points().count());
-    }
+    const Record* polygons = source.body->child("PolygonVertexIndex");
+    if (!polygons)
+        return 0;
+    readItems(*polygons, mesh.polygonVertices());
+    return cutIntoPolygons(mesh.polygonVertices(), mesh.polygonStarts(), mesh.points().count());
 }
 
 void readShape(FbxShape& shape, const FbxGeometryBase& base, const Record& body) {

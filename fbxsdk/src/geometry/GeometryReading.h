@@ -21,7 +21,8 @@ void attachSource(FbxGeometryBase& geometry, const std::shared_ptr<const Documen
 
 // What the classes call on the first access, without the layers. The object is empty then.
 
-void readMesh(FbxMesh& mesh, const GeometrySource& source);
+/// How many corners named points that there are not.
+int readMesh(FbxMesh& mesh, const GeometrySource& source);
 /// The base's points, moved by the offsets. Offsets for points that are not there are skipped.
 void readShape(FbxShape& shape, const FbxGeometryBase& base, const Record& body);
 

@@ -1,0 +1,30 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What the platform had to repair of a mesh's polygons, for `lastWarnings()`.
+#pragma once
+
+#include "ObjectWarnings.h"
+
+#include <fbxsdk.h>
+
+#include <string>
+
+namespace Tarnell::Fbx::detail {
+
+/// Only the bundled platform counts them; what another one makes of such corners is handed out as it is.
+template <class Mesh>
+void noteRepairedCorners(const std::string& fileName, const fbxsdk::FbxNode& node, const Mesh& mesh,
+                         ObjectWarnings& warnings) {
+    if constexpr (requires { mesh.GetRepairedCornerCount(); }) {
+        if (mesh.GetRepairedCornerCount() > 0) {
+            const bool hasPoints = mesh.GetControlPointsCount() > 0;
+            const std::string file = fileName.empty() ? "" : fileName + ": ";
+            warnings.add(file + '"' + node.GetName() + '"',
+                         hasPoints ? "corners of polygons name points that there are not, and are read as point 0"
+                                   : "the polygons name points, and there are none; they are left out");
+        }
+    }
+}
+
+} // namespace Tarnell::Fbx::detail
