@@ -12,6 +12,7 @@
 #include <new>
 #include <optional>
 #include <string>
+#include <tuple>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -127,45 +128,95 @@ void tryPositions(const std::function<Answer()>& work) {
     }
 }
 
-class ReadingWithoutMemory : public testing::TestWithParam<const char*> {};
+std::string fidelityName(EFbxFidelity fidelity) { return fidelity == kFbxFidelityFaithful ? "Faithful" : "Compatible"; }
+
+class ReadingWithoutMemory : public testing::TestWithParam<std::tuple<const char*, EFbxFidelity>> {};
 
 TEST_P(ReadingWithoutMemory, GivesAllOrFails) {
+    const auto [file, fidelity] = GetParam();
     TnFbxReadInfo info;
-    info.setFileName(std::string(TARNELL_TEST_DATA) + "/" + GetParam());
-    info.setAnimationStackName("Take 001");
+    info.setFileName(std::string(TARNELL_TEST_DATA) + "/" + file);
+    info.setFidelity(fidelity);
+    if (fidelity == kFbxFidelityCompatible) {
+        info.setAnimationStackName("Take 001");
+    }
     tryPositions([&] { return read(&Fbx::getMeshes, info); });
     tryPositions([&] { return read(&Fbx::getCameras, info); });
     tryPositions([&] { return read(&Fbx::getTransforms, info); });
 }
 
-INSTANTIATE_TEST_SUITE_P(Files, ReadingWithoutMemory,
-                         testing::Values("blender/layers_7400_binary.fbx", "blender/skin_7400_binary.fbx",
-                                         "container/handmade_values_3000_binary.fbx", "sdk/camera_5800_ascii.fbx",
-                                         "sdk/skin_5800_ascii.fbx", "sdk/blend_shape_6100_ascii.fbx",
-                                         "sdk/layers_7400_ascii.fbx", "sdk/nurbs_7400_ascii.fbx",
-                                         "sdk/caches_7400_ascii.fbx", "sdk/rig_7400_ascii.fbx",
-                                         "tool/moving_triangle.fbx"));
+INSTANTIATE_TEST_SUITE_P(
+    Files, ReadingWithoutMemory,
+    testing::Combine(testing::Values("blender/layers_7400_binary.fbx", "blender/skin_7400_binary.fbx",
+                                     "container/handmade_values_3000_binary.fbx", "sdk/camera_5800_ascii.fbx",
+                                     "sdk/skin_5800_ascii.fbx", "sdk/blend_shape_6100_ascii.fbx",
+                                     "sdk/layers_7400_ascii.fbx", "sdk/nurbs_7400_ascii.fbx",
+                                     "sdk/caches_7400_ascii.fbx", "sdk/rig_7400_ascii.fbx", "tool/moving_triangle.fbx"),
+                     testing::Values(kFbxFidelityCompatible, kFbxFidelityFaithful)),
+    [](const auto& param) {
+        std::string name = std::get<0>(param.param);
+        std::replace_if(
+            name.begin(), name.end(), [](char c) { return c == '/' || c == '.'; }, '_');
+        return name + "_" + fidelityName(std::get<1>(param.param));
+    });
 
-class WritingWithoutMemory : public testing::TestWithParam<int> {};
+/// Instances of one mesh, some of them placed alike and some not.
+constexpr char kInstances[] = "; FBX 7.4.0 project file\nFBXHeaderExtension: {\nFBXVersion: 7400\n}\nObjects: {\n"
+                              "Geometry: 10, \"Geometry::\", \"Mesh\" {\nVertices: *9 {\na: 0,0,0,1,0,0,0,1,0\n}\n"
+                              "PolygonVertexIndex: *3 {\na: 0,1,-3\n}\n}\n"
+                              "Model: 1, \"Model::a\", \"Mesh\" {\n}\nModel: 2, \"Model::b\", \"Mesh\" {\n}\n"
+                              "Model: 3, \"Model::c\", \"Mesh\" {\nProperties70: {\n"
+                              "P: \"Lcl Translation\", \"Lcl Translation\", \"\", \"A\",5,0,0\n}\n}\n}\n"
+                              "Connections: {\nC: \"OO\",1,0\nC: \"OO\",2,0\nC: \"OO\",3,0\n"
+                              "C: \"OO\",10,1\nC: \"OO\",10,2\nC: \"OO\",10,3\n}\n";
+
+class ReadingInstancesWithoutMemory : public testing::TestWithParam<EFbxFidelity> {};
+
+TEST_P(ReadingInstancesWithoutMemory, GivesAllOrFails) {
+    const support::TemporaryFolder folder;
+    TnFbxReadInfo info;
+    info.setFileName(folder.write("instances.fbx", kInstances));
+    info.setFidelity(GetParam());
+    info.setTransformPoints(true);
+    if (GetParam() == kFbxFidelityCompatible) {
+        info.setAnimationStackName("Take 001");
+    }
+    tryPositions([&] { return read(&Fbx::getMeshes, info); });
+}
+
+INSTANTIATE_TEST_SUITE_P(BothFidelities, ReadingInstancesWithoutMemory,
+                         testing::Values(kFbxFidelityCompatible, kFbxFidelityFaithful),
+                         [](const auto& param) { return fidelityName(param.param); });
+
+class WritingWithoutMemory : public testing::TestWithParam<std::tuple<int, EFbxFidelity>> {};
 
 TEST_P(WritingWithoutMemory, WritesAllOrFails) {
+    const auto [version, fidelity] = GetParam();
     const support::TemporaryFolder folder;
     const auto mesh = test::polygonMesh("box", 5);
     TnFbxCamera camera;
     camera.setName("camera");
+    TnFbxTime frames;
+    frames.setStartFrame(1);
+    frames.setEndFrame(3);
+    camera.setTransformValueAt(TnFbxTransform::kFbxTransformRotationY, frames, {10.0f, 20.0f, 40.0f});
+    camera.setValueAt(TnFbxCamera::kFbxCameraFocalLength, frames, {35.0f, 50.0f, 35.0f});
+    TnFbxLight light;
+    light.setName("camera"); // a name that stands twice
     TnFbxWriteInfo info;
     info.setFileName(folder.file("shot.fbx"));
     info.setAnimationStackName("Take 001");
-    info.setFileFormat(GetParam() % 2 == 0);
+    info.setFidelity(fidelity);
+    info.setFileFormat(version % 2 == 0);
     info.setAnimateMeshVertices(false);
-    info.setCompatibilityVersion(static_cast<TnFbxWriteInfo::eCompatibilityVersion>(GetParam()));
+    info.setCompatibilityVersion(static_cast<TnFbxWriteInfo::eCompatibilityVersion>(version));
     setenv("SOURCE_DATE_EPOCH", "1000000000", 1); // equal scenes give equal files
     const auto content = [&] { return static_cast<double>(std::hash<std::string>()(folder.read("shot.fbx"))); };
     tryPositions([&]() -> Answer {
         bool result = false;
         bool hadMemory = true;
         try {
-            result = Fbx().writeFile(info, {&camera}, {}, {}, {}, {mesh.get()});
+            result = Fbx().writeFile(info, {&camera}, {&light}, {}, {}, {mesh.get()});
         } catch (const std::bad_alloc&) {
             hadMemory = false;
         }
@@ -178,7 +229,13 @@ TEST_P(WritingWithoutMemory, WritesAllOrFails) {
     });
 }
 
-INSTANTIATE_TEST_SUITE_P(Versions, WritingWithoutMemory, testing::Range(0, 6));
+INSTANTIATE_TEST_SUITE_P(Versions, WritingWithoutMemory,
+                         testing::Combine(testing::Range(0, 6),
+                                          testing::Values(kFbxFidelityCompatible, kFbxFidelityFaithful)),
+                         [](const auto& param) {
+                             return std::to_string(std::get<0>(param.param)) + "_" +
+                                    fidelityName(std::get<1>(param.param));
+                         });
 
 } // namespace
 } // namespace Tarnell::Fbx
