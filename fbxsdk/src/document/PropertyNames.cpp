@@ -7,6 +7,8 @@
 #include <algorithm>
 #include <iterator>
 
+#include "schema/PropertyFlags.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
@@ -150,14 +152,14 @@ std::string_view subTypeOf(std::string_view typeName) {
 }
 
 std::string_view attributeFlags(RecordTree& tree, std::string_view flags) {
-    if (flags.find('N') == std::string_view::npos)
+    if (flags.find(kAttributeFlagLetter) == std::string_view::npos)
         return flags;
     const auto* found = std::find_if(std::begin(kAttributeFlags), std::end(kAttributeFlags),
                                      [&](const auto& row) { return row.first == flags; });
     if (found != std::end(kAttributeFlags))
         return found->second;
     std::string kept(flags);
-    std::erase(kept, 'N');
+    std::erase(kept, kAttributeFlagLetter);
     return tree.keepText(std::move(kept));
 }
 

@@ -11,6 +11,7 @@
 #include <fbxsdk/FbxObject.h>
 
 #include "object/ObjectData.h"
+#include "schema/PropertyFlags.h"
 #include "schema/PropertyTypes.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -54,18 +55,10 @@ void setValue(FbxProperty& property, const DocumentProperty& line) {
     }
 }
 
+/// Adds to those of the class.
 void setFlags(FbxProperty& property, std::string_view flags) {
-    constexpr struct {
-        char letter;
-        FbxPropertyFlags::EFlags flag;
-    } kLetters[] = {{'A', FbxPropertyFlags::eAnimatable},
-                    {'+', FbxPropertyFlags::eAnimated},
-                    {'U', FbxPropertyFlags::eUserDefined},
-                    {'H', FbxPropertyFlags::eHidden}};
-    for (const auto& row : kLetters) {
-        if (flags.find(row.letter) != std::string_view::npos)
-            property.ModifyFlag(row.flag, true);
-    }
+    if (const unsigned stated = propertyFlags(flags); stated != 0)
+        property.ModifyFlag(static_cast<FbxPropertyFlags::EFlags>(stated), true);
 }
 
 /// Whether the line says what the class's row says already, so that nothing needs to be stored.

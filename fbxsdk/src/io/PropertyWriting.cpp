@@ -11,6 +11,7 @@
 #include <fbxsdk/FbxAnimCurveNode.h>
 
 #include "scene/IdleCurveNode.h"
+#include "schema/PropertyFlags.h"
 #include "schema/PropertyTypes.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -60,33 +61,10 @@ bool isConnected(const PropertyData& property) {
            std::any_of(property.plug.sources.begin(), property.plug.sources.end(), isWritten);
 }
 
-/// `L` and `M` with the locked and muted components as bits; nothing when there are none.
-void appendMask(std::string& text, char letter, unsigned flags, unsigned first) {
-    constexpr unsigned kComponents = 0xF;
-    const unsigned mask = flags / first & kComponents;
-    if (mask != 0)
-        text += letter + std::to_string(mask);
-}
-
-std::string flagText(unsigned flags, bool animated) {
-    constexpr struct {
-        unsigned flag;
-        char letter;
-    } kLetters[] = {{FbxPropertyFlags::eAnimatable, 'A'},
-                    {FbxPropertyFlags::eAnimated, '+'},
-                    {FbxPropertyFlags::eUserDefined, 'U'},
-                    {FbxPropertyFlags::eHidden, 'H'}};
+/// Whether curves drive a property is seen from its connections, not from what a file once said.
+unsigned flagsWith(unsigned flags, bool animated) {
     constexpr unsigned kAnimated = FbxPropertyFlags::eAnimatable | FbxPropertyFlags::eAnimated;
-    // Whether curves drive a property is seen from its connections, not from what a file once said.
-    flags = animated ? flags | kAnimated : flags & ~static_cast<unsigned>(FbxPropertyFlags::eAnimated);
-    std::string text;
-    for (const auto& row : kLetters) {
-        if ((flags & row.flag) != 0)
-            text += row.letter;
-    }
-    appendMask(text, 'L', flags, FbxPropertyFlags::eLockedMember0);
-    appendMask(text, 'M', flags, FbxPropertyFlags::eMutedMember0);
-    return text;
+    return animated ? flags | kAnimated : flags & ~static_cast<unsigned>(FbxPropertyFlags::eAnimated);
 }
 
 std::span<const Value> valuesOf(const FbxDataType& type, const PropertyValue& value, RecordTree& texts) {
@@ -128,7 +106,7 @@ DocumentProperty defaultLine(const PropertyRow& row, RecordTree& texts) {
 DocumentProperty writableLine(const PropertyData& data, RecordTree& texts) {
     const bool animated = isAnimated(data);
     DocumentProperty property = line(data.row ? std::string_view(data.row->name) : std::string_view(data.name),
-                                     data.type, data.value, flagText(data.flags, animated), texts);
+                                     data.type, data.value, propertyFlagText(flagsWith(data.flags, animated)), texts);
     spellType(property, animated || (data.flags & FbxPropertyFlags::eAnimatable) != 0);
     return property;
 }

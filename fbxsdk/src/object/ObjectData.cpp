@@ -8,6 +8,7 @@
 #include <cstring>
 
 #include "object/ManagerData.h"
+#include "schema/PropertyFlags.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -18,19 +19,6 @@ bool equalNames(std::string_view a, std::string_view b, bool caseSensitive) {
         return a == b;
     const auto lower = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c; };
     return std::equal(a.begin(), a.end(), b.begin(), b.end(), [&](char x, char y) { return lower(x) == lower(y); });
-}
-
-unsigned flagsOf(const PropertyRow& row) {
-    unsigned flags = FbxPropertyFlags::eStatic;
-    for (const char* letter = row.flags; *letter; ++letter) {
-        if (*letter == 'A')
-            flags |= FbxPropertyFlags::eAnimatable;
-        if (*letter == 'H')
-            flags |= FbxPropertyFlags::eHidden;
-        if (*letter == 'U')
-            flags |= FbxPropertyFlags::eUserDefined;
-    }
-    return flags;
 }
 
 void noteChange(const FbxObject& object) { ++object.GetFbxManager()->data().revision; }
@@ -76,7 +64,7 @@ PropertyData& ObjectData::materialise(int index) {
     made->index = index;
     made->row = &row;
     made->type = *row.type;
-    made->flags = flagsOf(row);
+    made->flags = defaultFlags(row);
     made->value = defaultValue(row);
     made->plug.object = plug.object;
     made->plug.property = index;
@@ -118,7 +106,7 @@ PropertyValue defaultValue(const PropertyRow& row) {
     return value;
 }
 
-unsigned defaultFlags(const PropertyRow& row) { return flagsOf(row); }
+unsigned defaultFlags(const PropertyRow& row) { return FbxPropertyFlags::eStatic | propertyFlags(row.flags); }
 
 bool isConnected(const ConnectionPoint& source, const ConnectionPoint& destination) {
     // Either list tells; the shorter one is quicker, and the list of a scene's members is long.

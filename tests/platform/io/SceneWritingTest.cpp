@@ -52,6 +52,21 @@ void expectVector(const FbxDouble3& actual, double x, double y, double z) {
     EXPECT_EQ(actual[2], z);
 }
 
+/// L for each locked component, M for each muted one.
+std::string componentFlags(const FbxProperty& property) {
+    std::string text = ".... ....";
+    for (unsigned component = 0; component < 4; ++component) {
+        const auto isSet = [&](unsigned first) {
+            return property.GetFlag(static_cast<FbxPropertyFlags::EFlags>(first << component));
+        };
+        if (isSet(FbxPropertyFlags::eLockedMember0))
+            text[component] = 'L';
+        if (isSet(FbxPropertyFlags::eMutedMember0))
+            text[5 + component] = 'M';
+    }
+    return text;
+}
+
 TEST_P(SceneWriting, StatesTheVersion) {
     writeAndRead();
 
@@ -384,6 +399,27 @@ TEST_P(SceneWriting, KeepsUserProperties) {
     for (FbxProperty property = back->FindProperty("a bool"); property.IsValid();
          property = back->GetNextProperty(property))
         EXPECT_TRUE(property.GetFlag(FbxPropertyFlags::eUserDefined)) << property.GetNameAsCStr();
+}
+
+TEST_P(SceneWriting, KeepsLockedAndMutedComponents) {
+    FbxLight* light = make<FbxLight>("light");
+    FbxNode* node = addNode("node", light);
+    node->LclTranslation.ModifyFlag(FbxPropertyFlags::eLockedAll, true);
+    node->LclTranslation.ModifyFlag(FbxPropertyFlags::eLockedMember3, false);
+    node->LclRotation.ModifyFlag(FbxPropertyFlags::eLockedMember2, true);
+    node->LclRotation.ModifyFlag(FbxPropertyFlags::eMutedMember0, true);
+    light->Intensity.ModifyFlag(FbxPropertyFlags::eMutedMember0, true);
+    FbxProperty four = FbxProperty::Create(node, FbxDouble4DT, "four");
+    four.ModifyFlag(FbxPropertyFlags::eUserDefined, true);
+    four.ModifyFlag(FbxPropertyFlags::eMutedAll, true);
+
+    FbxNode* back = childOf(writeAndRead());
+
+    EXPECT_EQ(componentFlags(back->LclTranslation), "LLL. ....");
+    EXPECT_EQ(componentFlags(back->LclRotation), "..L. M...");
+    EXPECT_EQ(componentFlags(back->LclScaling), ".... ....");
+    EXPECT_EQ(componentFlags(back->GetLight()->Intensity), ".... M...");
+    EXPECT_EQ(componentFlags(back->FindProperty("four")), ".... MMMM");
 }
 
 TEST_P(SceneWriting, LeavesOutWhatIsNotToBeSaved) {

@@ -12,6 +12,7 @@
 
 #include "object/ObjectData.h"
 #include "platform/scene/SceneFixture.h"
+#include "schema/PropertyFlags.h"
 
 namespace {
 
@@ -337,6 +338,34 @@ TEST_F(FbxPropertyTest, KnowsTheNumbersOfTheFlags) {
     EXPECT_EQ(FbxPropertyFlags::eHidden, 32);
     EXPECT_EQ(FbxPropertyFlags::eNotSavable, 64);
     EXPECT_EQ(FbxPropertyFlags::eLockedMember0, 128);
+}
+
+TEST_F(FbxPropertyTest, SpellsFlagsAsFilesDo) {
+    using Flags = FbxPropertyFlags;
+    const struct {
+        const char* text;
+        unsigned flags;
+    } kSpellings[] = {
+        {"", 0},
+        {"A", Flags::eAnimatable},
+        {"A+", Flags::eAnimatable | Flags::eAnimated},
+        {"A+U", Flags::eAnimatable | Flags::eAnimated | Flags::eUserDefined},
+        {"UH", Flags::eUserDefined | Flags::eHidden},
+        {"AL7", Flags::eAnimatable | Flags::eLockedMember0 | Flags::eLockedMember1 | Flags::eLockedMember2},
+        {"A+L4M1", Flags::eAnimatable | Flags::eAnimated | Flags::eLockedMember2 | Flags::eMutedMember0},
+        {"L15M15", Flags::eLockedAll | Flags::eMutedAll},
+    };
+    for (const auto& row : kSpellings) {
+        EXPECT_EQ(detail::propertyFlags(row.text), row.flags) << row.text;
+        EXPECT_EQ(detail::propertyFlagText(row.flags), row.text);
+    }
+}
+
+TEST_F(FbxPropertyTest, TakesNothingFromFlagsThatAreNone) {
+    for (const char* text : {"N", "L", "M", "L-1", "L0", "L99999999999", "7", "\xff"})
+        EXPECT_EQ(detail::propertyFlags(text), 0U) << text;
+    EXPECT_EQ(detail::propertyFlags("AL16N"), FbxPropertyFlags::eAnimatable);
+    EXPECT_EQ(detail::propertyFlagText(FbxPropertyFlags::eStatic | FbxPropertyFlags::eNotSavable), "");
 }
 
 // Connections.

@@ -10,6 +10,7 @@
 #include "document/legacy/LegacyObjects.h"
 #include "document/legacy/LegacySettings.h"
 #include "document/legacy/LegacyTakes.h"
+#include "schema/PropertyFlags.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -58,8 +59,8 @@ std::vector<DocumentProperty> readProperties(DocumentBuilder& builder, const Rec
 SplitProperties splitProperties(DocumentBuilder& builder, const Record& model) {
     SplitProperties split;
     for (DocumentProperty& property : readProperties(builder, model)) {
-        const bool flagged = property.flags.find('N') != std::string_view::npos;
-        const bool user = property.flags.find('U') != std::string_view::npos;
+        const bool flagged = property.flags.find(kAttributeFlagLetter) != std::string_view::npos;
+        const bool user = property.flags.find(kUserFlagLetter) != std::string_view::npos;
         if (!flagged && (user || isModelProperty(property.name))) {
             split.model.push_back(property);
             continue;

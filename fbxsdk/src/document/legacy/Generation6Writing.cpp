@@ -10,6 +10,7 @@
 #include "document/RecordWriting.h"
 #include "document/legacy/LegacyLayout.h"
 #include "document/legacy/TakeWriting.h"
+#include "schema/PropertyFlags.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -194,10 +195,10 @@ private:
             if (legacyPropertyName(attribute.subClass, property.name) != property.name)
                 renamed.push_back(&property);
             else
-                writeProperty(property, attribute.subClass, std::string(property.flags) + 'N');
+                writeProperty(property, attribute.subClass, std::string(property.flags) + kAttributeFlagLetter);
         }
         for (const DocumentProperty* property : renamed)
-            writeProperty(*property, attribute.subClass, std::string(property->flags) + 'N');
+            writeProperty(*property, attribute.subClass, std::string(property->flags) + kAttributeFlagLetter);
     }
 
     void writeProperty(DocumentProperty property, std::string_view subClass, std::string_view flags) {
