@@ -26,6 +26,7 @@ struct ElementSource {
     std::shared_ptr<const Document> document;
     const Record* direct = nullptr;
     const Record* index = nullptr;
+    const Record* fourth = nullptr; ///< the fourth numbers of vectors; 1 each where there are none
 };
 
 } // namespace detail

@@ -64,6 +64,24 @@ std::unique_ptr<StoredBytes> storedBytes(const std::shared_ptr<const FileBytes>&
     return inflated->isSound() ? std::move(inflated) : nullptr;
 }
 
+struct FourthNumbers {
+    std::unique_ptr<double[]> numbers;
+    int count = 0;
+};
+
+/// None when all of them are 1, as nearly always: the vectors can stay in the file then.
+FourthNumbers unusualFourths(const Record* record) {
+    const int count = record ? itemCount(*record, 1) : 0;
+    if (count == 0)
+        return {};
+    const auto size = static_cast<std::size_t>(count);
+    auto numbers = std::make_unique_for_overwrite<double[]>(size);
+    const std::span all(numbers.get(), size);
+    const bool usual =
+        !record->readNumbers(all) || std::all_of(all.begin(), all.end(), [](double number) { return number == 1.0; });
+    return usual ? FourthNumbers{} : FourthNumbers{std::move(numbers), count};
+}
+
 } // namespace
 
 bool readItems(const Record& record, PlainArray<FbxVector4>& items) {
@@ -114,6 +132,15 @@ bool fetchItems(const Document& document, const Record& record, PlainArray<Item>
     constexpr std::size_t kNumberBytes = std::is_same_v<Item, int> ? sizeof(std::int32_t) : sizeof(double);
     const int count = itemCount(record, kStoredBytes<Item> / kNumberBytes);
     items.keepStored(std::make_unique<StoredItems>(std::move(bytes), count, kStoredBytes<Item>), count);
+    return true;
+}
+
+bool fetchVectors(const Document& document, const Record& record, const Record* fourth, PlainArray<FbxVector4>& items) {
+    const auto [numbers, count] = unusualFourths(fourth);
+    if (!fetchItems(document, record, items))
+        return false;
+    for (int i = 0; i < std::min(count, items.count()); ++i)
+        items[i][3] = numbers[static_cast<std::size_t>(i)];
     return true;
 }
 

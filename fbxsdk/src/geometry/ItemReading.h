@@ -32,6 +32,10 @@ bool readItems(const Record& record, PlainArray<bool>& items);
 template <class Item>
 bool fetchItems(const Document& document, const Record& record, PlainArray<Item>& items);
 
+/// The same for vectors that may have their fourth numbers in a record of its own. They are 1 where there is none, and
+/// where it is corrupt: nobody needs them to use the other three.
+bool fetchVectors(const Document& document, const Record& record, const Record* fourth, PlainArray<FbxVector4>& items);
+
 extern template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector4>&);
 extern template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector2>&);
 extern template bool fetchItems(const Document&, const Record&, PlainArray<FbxColor>&);

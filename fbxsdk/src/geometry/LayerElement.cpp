@@ -68,7 +68,10 @@ template <class T>
 void FbxLayerElementTemplate<T>::readPending() const {
     const std::unique_ptr<detail::ElementSource> source = std::move(mSource);
     // Pointers are no content of files.
-    if constexpr (!std::is_pointer_v<T>) {
+    if constexpr (std::is_same_v<T, FbxVector4>) {
+        if (source->direct && mDirectArray)
+            detail::fetchVectors(*source->document, *source->direct, source->fourth, mDirectArray->items());
+    } else if constexpr (!std::is_pointer_v<T>) {
         if (source->direct && mDirectArray)
             detail::fetchItems(*source->document, *source->direct, mDirectArray->items());
     }

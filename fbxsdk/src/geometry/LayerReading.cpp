@@ -42,6 +42,7 @@ struct ElementKind {
     Element* (*create)(FbxLayerContainer& container, const char* name);
     Storage storage;
     std::string_view direct, index; ///< records with the arrays
+    std::string_view fourth = {};   ///< … and with the fourth numbers of vectors
 };
 
 template <class Class>
@@ -50,11 +51,12 @@ Element* create(FbxLayerContainer& container, const char* name) {
 }
 
 const ElementKind kKinds[] = {
-    {"LayerElementNormal", Element::eNormal, create<FbxLayerElementNormal>, Storage::values, "Normals", "NormalsIndex"},
+    {"LayerElementNormal", Element::eNormal, create<FbxLayerElementNormal>, Storage::values, "Normals", "NormalsIndex",
+     "NormalsW"},
     {"LayerElementBinormal", Element::eBiNormal, create<FbxLayerElementBinormal>, Storage::values, "Binormals",
-     "BinormalsIndex"},
+     "BinormalsIndex", "BinormalsW"},
     {"LayerElementTangent", Element::eTangent, create<FbxLayerElementTangent>, Storage::values, "Tangents",
-     "TangentsIndex"},
+     "TangentsIndex", "TangentsW"},
     {"LayerElementColor", Element::eVertexColor, create<FbxLayerElementVertexColor>, Storage::values, "Colors",
      "ColorIndex"},
     {"LayerElementMaterial", Element::eMaterial, create<FbxLayerElementMaterial>, Storage::numbers, "", "Materials"},
@@ -178,7 +180,9 @@ private:
         element->SetReferenceMode(referenceOf(record, kind.storage, index != nullptr));
         if (element->GetReferenceMode() == Element::eDirect)
             index = nullptr;
-        Access::setSource(*element, std::make_unique<ElementSource>(ElementSource{mSource.document, direct, index}));
+        const Record* fourth = childWithNumbers(record, kind.fourth);
+        Access::setSource(*element,
+                          std::make_unique<ElementSource>(ElementSource{mSource.document, direct, index, fourth}));
         return element;
     }
 

@@ -134,6 +134,38 @@ TEST_P(GeometryWriting, KeepsNormalsOfEveryMapping) {
     }
 }
 
+/// The fourth numbers of vectors are 1 in versions that do not write them.
+TEST_P(GeometryWriting, KeepsTheFourthNumbersOfNormalsTangentsAndBinormals) {
+    constexpr int kManyCorners = 4000; // so many that their array is fetched in portions
+    const bool written = detail::findVersion(GetParam().version)->normalVersion >= 102;
+    FbxMesh* mesh = addMesh();
+    FbxLayer* layer = mesh->GetLayer(mesh->CreateLayer());
+    const auto fill = [&](auto* element, int count, double unusual) {
+        element->SetMappingMode(Element::eByPolygonVertex);
+        for (int i = 0; i < count; ++i)
+            element->GetDirectArray().Add(FbxVector4(i, 2, 3, i % 2 == 0 ? unusual : 1.0));
+        return element;
+    };
+    layer->SetNormals(fill(FbxLayerElementNormal::Create(mesh, ""), kManyCorners, 0.0));
+    layer->SetTangents(fill(FbxLayerElementTangent::Create(mesh, ""), 7, -1.0));
+    layer->SetBinormals(fill(FbxLayerElementBinormal::Create(mesh, ""), kManyCorners, 1.0));
+
+    const FbxMesh* back = attributeOf<FbxMesh>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    const auto expectVectors = [&](const auto* element, int count, double unusual) {
+        ASSERT_NE(element, nullptr);
+        ASSERT_EQ(element->GetDirectArray().GetCount(), count);
+        for (int i = 0; i < count; ++i) {
+            const double fourth = i % 2 == 0 && written ? unusual : 1.0;
+            ASSERT_EQ(element->GetDirectArray().GetAt(i), FbxVector4(i, 2, 3, fourth)) << i;
+        }
+    };
+    expectVectors(back->GetLayer(0)->GetNormals(), kManyCorners, 0.0);
+    expectVectors(back->GetLayer(0)->GetTangents(), 7, -1.0);
+    expectVectors(back->GetLayer(0)->GetBinormals(), kManyCorners, 1.0);
+}
+
 TEST_P(GeometryWriting, KeepsIndexedCoordinatesAndColours) {
     FbxMesh* mesh = addMesh();
     FbxLayer* layer = mesh->GetLayer(mesh->CreateLayer());
