@@ -62,6 +62,7 @@ struct DocumentTemplate {
 
 struct DocumentTake {
     std::string_view name;
+    std::string_view description{};
     std::int64_t localStart = 0, localStop = 0, referenceStart = 0, referenceStop = 0; ///< ticks
     bool hasLocal = false, hasReference = false;
 };

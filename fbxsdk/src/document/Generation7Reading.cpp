@@ -3,12 +3,11 @@
 //
 // Files of the 7.x generation: numbered objects and connections between the numbers. Little is to be translated.
 #include <algorithm>
-#include <unordered_map>
 
 #include "document/DocumentBuilder.h"
 #include "document/PropertyNames.h"
+#include "document/TakeTimes.h"
 #include "document/legacy/InlineShapes.h"
-#include "document/legacy/LegacySettings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -111,27 +110,6 @@ constexpr Section kSections[] = {
     {"Definitions", readDefinitions},       {"Objects", readObjects},
     {"Connections", readConnections},       {"Takes", readTakeTimes},
 };
-
-bool hasProperty(const DocumentObject& object, std::string_view first, std::string_view second) {
-    return object.property(first) || object.property(second);
-}
-
-/// A stack without times of its own has those of the take of its name.
-void fillStackTimes(DocumentBuilder& builder) {
-    Document& document = builder.document();
-    std::unordered_map<std::string_view, const DocumentTake*> takes;
-    for (const DocumentTake& take : document.takes)
-        takes.emplace(take.name, &take);
-    for (DocumentObject& object : document.objects) {
-        const auto take = object.record == "AnimationStack" ? takes.find(object.name) : takes.end();
-        if (take == takes.end())
-            continue;
-        DocumentTake missing = *take->second;
-        missing.hasLocal = missing.hasLocal && !hasProperty(object, "LocalStart", "LocalStop");
-        missing.hasReference = missing.hasReference && !hasProperty(object, "ReferenceStart", "ReferenceStop");
-        addTakeTimes(builder, missing, object.properties);
-    }
-}
 
 } // namespace
 

@@ -8,7 +8,7 @@
 #include <fbxsdk/FbxScene.h>
 
 #include "container/FileBytes.h"
-#include "document/Document.h"
+#include "document/TakeTimes.h"
 #include "io/SceneReading.h"
 #include "object/ManagerData.h"
 
@@ -23,43 +23,13 @@ namespace {
 
 FbxString stringOf(std::string_view text) { return {text.data() ? text.data() : "", text.size()}; }
 
-FbxTakeInfo takeOf(const detail::DocumentTake& take) {
+FbxTakeInfo takeInfo(const detail::DocumentTake& take) {
     FbxTakeInfo info;
     info.mName = info.mImportName = stringOf(take.name);
+    info.mDescription = stringOf(take.description);
     info.mLocalTimeSpan.Set(FbxTime(take.localStart), FbxTime(take.localStop));
     info.mReferenceTimeSpan.Set(FbxTime(take.referenceStart), FbxTime(take.referenceStop));
     return info;
-}
-
-FbxTime timeOf(const detail::DocumentObject& stack, const char* name) {
-    const detail::DocumentProperty* line = stack.property(name);
-    return FbxTime(line && !line->values.empty() ? line->values.front().toInteger() : 0);
-}
-
-/// The document has given the stack the times of its take where it states none itself.
-FbxTakeInfo takeOf(const detail::DocumentObject& stack) {
-    FbxTakeInfo info;
-    info.mName = info.mImportName = stringOf(stack.name);
-    info.mLocalTimeSpan.Set(timeOf(stack, "LocalStart"), timeOf(stack, "LocalStop"));
-    info.mReferenceTimeSpan.Set(timeOf(stack, "ReferenceStart"), timeOf(stack, "ReferenceStop"));
-    if (const detail::DocumentProperty* text = stack.property("Description"); text && !text->values.empty()) {
-        info.mDescription = stringOf(text->values.front().toText());
-    }
-    return info;
-}
-
-/// One for every stack that an import will make; of a file that only lists takes, those.
-std::vector<FbxTakeInfo> takesOf(const detail::Document& document) {
-    std::vector<FbxTakeInfo> takes;
-    for (const detail::DocumentObject& object : document.objects) {
-        if (object.record == "AnimationStack")
-            takes.push_back(takeOf(object));
-    }
-    if (!takes.empty())
-        return takes;
-    for (const detail::DocumentTake& take : document.takes)
-        takes.push_back(takeOf(take));
-    return takes;
 }
 
 } // namespace
@@ -82,7 +52,8 @@ bool FbxImporter::Initialize(const char* pFileName, int pFileFormat, FbxIOSettin
     mHeader.mASCII = mDocument->tree->ascii;
     for (const std::string& warning : mDocument->warnings)
         mHeader.mWarnings.emplace_back(warning.c_str());
-    mTakes = takesOf(*mDocument);
+    for (const detail::DocumentTake& take : detail::listTakes(*mDocument))
+        mTakes.push_back(takeInfo(take));
     return true;
 }
 

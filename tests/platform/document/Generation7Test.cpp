@@ -4,6 +4,8 @@
 // Files of the 7.x generation.
 #include "DocumentFromText.h"
 
+#include "document/TakeTimes.h"
+
 #include "document/DocumentBuilder.h"
 
 namespace fbxsdk::detail {
@@ -158,6 +160,35 @@ TEST(Generation7, GivesAStackWithoutTimesThoseOfItsTake) {
     EXPECT_EQ(numbersOf(x, "ReferenceStop"), (Numbers{40}));
     EXPECT_EQ(numbersOf(document->find(2), "LocalStop"), (Numbers{9}));
     EXPECT_EQ(document->find(2)->property("LocalStart"), nullptr);
+}
+
+TEST(Generation7, ListsStacksWithTheirTimes) {
+    const auto document = documentOf("7.1.0", R"(
+        Objects: { AnimationStack: 1, "AnimStack::X", "" { Properties70: {
+                       P: "Description", "KString", "", "","of X"
+                       P: "ReferenceStop", "KTime", "Time", "",7 } } }
+        Takes: { Current: "X"
+            Take: "Y" { LocalTime: 50,60 }
+            Take: "X" { LocalTime: 10,20
+                        ReferenceTime: 30,40 } })");
+    const std::vector<DocumentTake> takes = listTakes(*document);
+    ASSERT_EQ(takes.size(), 1U);
+    EXPECT_EQ(takes[0].name, "X");
+    EXPECT_EQ(takes[0].description, "of X");
+    EXPECT_EQ(takes[0].localStart, 10);
+    EXPECT_EQ(takes[0].localStop, 20);
+    EXPECT_EQ(takes[0].referenceStart, 0);
+    EXPECT_EQ(takes[0].referenceStop, 7);
+}
+
+TEST(Generation7, ListsTheTakesOfAFileWithoutStacks) {
+    const auto document = documentOf("7.1.0", R"(Takes: { Current: ""
+        Take: "a" { LocalTime: 1,2 }
+        Take: "b" { LocalTime: 3,4 } })");
+    const std::vector<DocumentTake> takes = listTakes(*document);
+    ASSERT_EQ(takes.size(), 2U);
+    EXPECT_EQ(takes[1].name, "b");
+    EXPECT_EQ(takes[1].localStop, 4);
 }
 
 TEST(Generation7, ReadsTakes) {

@@ -22,15 +22,6 @@ constexpr RateRow kRates[] = {
 };
 constexpr int kCustomTimeMode = 14;
 
-bool readRange(DocumentBuilder& builder, const Record* record, std::int64_t& start, std::int64_t& stop) {
-    std::int64_t range[2] = {0, 0};
-    if (!record || record->numberCount() < 2 || !record->readNumbers(range))
-        return false;
-    start = builder.ticks(range[0]);
-    stop = builder.ticks(range[1]);
-    return true;
-}
-
 bool hasSetting(const Document& document, std::string_view name) {
     return std::any_of(document.globalSettings.begin(), document.globalSettings.end(),
                        [&](const DocumentProperty& property) { return property.name == name; });
@@ -120,34 +111,6 @@ constexpr SettingsRow kSettings[] = {
 };
 
 } // namespace
-
-void readTakeTimes(DocumentBuilder& builder, const Record& takes) {
-    Document& document = builder.document();
-    if (document.activeStackName.empty())
-        document.activeStackName = takes.childValue("Current").toText();
-    for (const Record& record : takes.children()) {
-        if (record.name != "Take")
-            continue;
-        DocumentTake& take = document.takes.emplace_back();
-        take.name = record.value(0).toText();
-        take.hasLocal = readRange(builder, record.child("LocalTime"), take.localStart, take.localStop);
-        take.hasReference = readRange(builder, record.child("ReferenceTime"), take.referenceStart, take.referenceStop);
-    }
-}
-
-void addTakeTimes(DocumentBuilder& builder, const DocumentTake& take, std::vector<DocumentProperty>& properties) {
-    const auto add = [&](std::string_view name, std::int64_t time) {
-        properties.push_back(propertyOf(name, "KTime", "Time", "", builder.keep({Value::ofInteger(time)})));
-    };
-    if (take.hasLocal) {
-        add("LocalStart", take.localStart);
-        add("LocalStop", take.localStop);
-    }
-    if (take.hasReference) {
-        add("ReferenceStart", take.referenceStart);
-        add("ReferenceStop", take.referenceStop);
-    }
-}
 
 void readLegacySettings(DocumentBuilder& builder, const Record& parent) {
     for (const Record& record : parent.children())

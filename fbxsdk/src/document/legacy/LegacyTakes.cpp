@@ -10,8 +10,8 @@
 #include <set>
 
 #include "document/PropertyNames.h"
+#include "document/TakeTimes.h"
 #include "document/legacy/LegacyKeys.h"
-#include "document/legacy/LegacySettings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
