@@ -4,33 +4,11 @@
 // Keys for writing.
 #include "animation/CurveConversion.h"
 
-#include <algorithm>
+#include "animation/CurveEvaluation.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
-
-DocumentCurve::Attribute attributeOf(const KeyAttributes& source) {
-    DocumentCurve::Attribute attribute;
-    attribute.flags = source.flags;
-    std::copy(source.data.begin(), source.data.end(), std::begin(attribute.data));
-    return attribute;
-}
-
-DocumentCurve::Extrapolation extrapolationOf(const Extrapolation& source) {
-    constexpr struct {
-        ExtrapolationType type;
-        char letter;
-    } kLetters[] = {{ExtrapolationType::repetition, 'R'},
-                    {ExtrapolationType::mirrorRepetition, 'M'},
-                    {ExtrapolationType::keepSlope, 'K'},
-                    {ExtrapolationType::relativeRepetition, 'A'}};
-    for (const auto& row : kLetters) {
-        if (row.type == source.type)
-            return {row.letter, source.count};
-    }
-    return {};
-}
 
 /// Whether old files have a letter for the key's tangents.
 bool hasLegacyForm(const KeyAttributes& attributes) {
@@ -57,7 +35,7 @@ bool isBentEnd(const CurveKeys& keys, std::size_t key) {
 
 /// Which keys an old file can hold as they are. It has the slope at which a cubic key comes to the next one only where
 /// that is worked out anew from the next key, or said by the user.
-std::vector<bool> legacyKeys(const CurveKeys& keys) {
+std::vector<bool> keptKeys(const CurveKeys& keys) {
     constexpr std::uint32_t kStored = KeyFlag::tangentUser | KeyFlag::constant;
     constexpr std::uint32_t kWorkedOut = KeyFlag::tangentAuto | KeyFlag::tangentTcb;
     std::vector<bool> legacy(keys.keyCount());
@@ -73,12 +51,12 @@ std::vector<bool> legacyKeys(const CurveKeys& keys) {
 }
 
 /// The key as a user would have to set it for the curve to be the same.
-DocumentCurve::Attribute userAttribute(const CurveKeys& keys, std::size_t key, bool nextStaysAuto) {
+KeyAttributes userAttributes(const CurveKeys& keys, std::size_t key, bool nextStaysAuto) {
     constexpr std::uint32_t kWorkedOut = KeyFlag::tangentAuto | KeyFlag::tangentTcb | KeyFlag::genericClamp |
                                          KeyFlag::genericClampProgressive | KeyFlag::genericTimeIndependent;
     const KeyAttributes& source = keys.attributesOf(key);
     const bool tcb = (source.flags & KeyFlag::tangentTcb) != 0;
-    DocumentCurve::Attribute attribute = attributeOf(tcb ? CurveKeys::kDefaultAttributes : source);
+    KeyAttributes attribute = tcb ? CurveKeys::kDefaultAttributes : source;
     attribute.flags = (source.flags & ~kWorkedOut) | KeyFlag::tangentUser;
     attribute.data[KeyData::rightSlope] = static_cast<float>(rightSlope(keys, key));
     // Before an automatic tangent this is its bias.
@@ -90,26 +68,25 @@ DocumentCurve::Attribute userAttribute(const CurveKeys& keys, std::size_t key, b
 
 } // namespace
 
-DocumentCurve documentCurve(const CurveKeys& keys, const VersionTraits& traits) {
-    DocumentCurve curve;
+CurveKeys legacyKeys(const CurveKeys& keys) {
+    CurveKeys curve;
     const auto count = static_cast<std::ptrdiff_t>(keys.keyCount());
-    curve.defaultValue = static_cast<double>(keys.defaultValue);
+    curve.defaultValue = keys.defaultValue;
     curve.times.assign(keys.times.begin(), keys.times.begin() + count);
     curve.values.assign(keys.values.begin(), keys.values.begin() + count);
-    curve.pre = extrapolationOf(keys.before);
-    curve.post = extrapolationOf(keys.after);
-    const std::vector<bool> legacy = traits.idsAndTemplates ? std::vector<bool>() : legacyKeys(keys);
+    curve.before = keys.before;
+    curve.after = keys.after;
+    const std::vector<bool> kept = keptKeys(keys);
     const auto staysAuto = [&](std::size_t key) {
-        return key < legacy.size() && legacy[key] && isAutomatic(keys.attributesOf(key).flags);
+        return key < kept.size() && kept[key] && isAutomatic(keys.attributesOf(key).flags);
     };
     const KeyAttributes* last = nullptr;
     for (std::size_t key = 0; key < keys.keyCount(); ++key) {
         const KeyAttributes& attributes = keys.attributesOf(key);
-        const bool kept = traits.idsAndTemplates || legacy[key];
-        if (!kept || &attributes != last)
-            curve.attributes.push_back(kept ? attributeOf(attributes) : userAttribute(keys, key, staysAuto(key + 1)));
-        last = kept ? &attributes : nullptr;
-        curve.attributeIndex.push_back(static_cast<std::uint32_t>(curve.attributes.size() - 1));
+        if (!kept[key] || &attributes != last)
+            curve.attributes.push_back(kept[key] ? attributes : userAttributes(keys, key, staysAuto(key + 1)));
+        last = kept[key] ? &attributes : nullptr;
+        curve.attributeOfKey.push_back(static_cast<std::uint32_t>(curve.attributes.size() - 1));
     }
     return curve;
 }

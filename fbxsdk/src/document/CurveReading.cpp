@@ -13,10 +13,6 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Weights are stored as whole numbers of this unit; so are velocities.
-constexpr float kPackedUnit = 9999.0F;
-constexpr std::size_t kWordsPerAttribute = 4;
-
 template <class Number>
 std::vector<Number> readAll(const Record& owner, std::string_view name) {
     const Record* record = owner.child(name);
@@ -40,25 +36,25 @@ float unpackedVelocity(std::uint32_t halfWord) {
 }
 
 /// Weights and velocities count only where the flags say so.
-void unpackWeights(DocumentCurve::Attribute& attribute, std::span<const std::uint32_t> words) {
-    if (attribute.flags & kKeyWeightedRight)
+void unpackWeights(KeyAttributes& attribute, std::span<const std::uint32_t> words) {
+    if (attribute.flags & KeyFlag::weightedRight)
         attribute.data[2] = unpackedWeight(words[2]);
-    if (attribute.flags & kKeyWeightedNextLeft)
+    if (attribute.flags & KeyFlag::weightedNextLeft)
         attribute.data[3] = unpackedWeight(words[2] >> 16U);
-    if (attribute.flags & kKeyVelocityRight)
+    if (attribute.flags & KeyFlag::velocityRight)
         attribute.data[4] = unpackedVelocity(words[3]);
-    if (attribute.flags & kKeyVelocityNextLeft)
+    if (attribute.flags & KeyFlag::velocityNextLeft)
         attribute.data[5] = unpackedVelocity(words[3] >> 16U);
 }
 
-DocumentCurve::Attribute unpacked(std::int32_t flags, std::span<const std::uint32_t> words) {
-    DocumentCurve::Attribute attribute;
+KeyAttributes unpacked(std::int32_t flags, std::span<const std::uint32_t> words) {
+    KeyAttributes attribute;
     attribute.flags = static_cast<std::uint32_t>(flags);
     if (words.size() < kWordsPerAttribute)
         return attribute;
     attribute.data[0] = std::bit_cast<float>(words[0]);
     attribute.data[1] = std::bit_cast<float>(words[1]);
-    const bool tcb = (attribute.flags & kKeyCubic) && (attribute.flags & kKeyTcb);
+    const bool tcb = (attribute.flags & KeyFlag::cubic) && (attribute.flags & KeyFlag::tangentTcb);
     if (tcb)
         attribute.data[2] = std::bit_cast<float>(words[2]);
     else
@@ -66,17 +62,17 @@ DocumentCurve::Attribute unpacked(std::int32_t flags, std::span<const std::uint3
     return attribute;
 }
 
-std::vector<DocumentCurve::Attribute> readAttributes(const Record& body) {
+std::vector<KeyAttributes> readAttributes(const Record& body) {
     const std::vector<std::int32_t> flags = readAll<std::int32_t>(body, "KeyAttrFlags");
     const std::vector<std::uint32_t> words = readWords(body, "KeyAttrDataFloat");
-    std::vector<DocumentCurve::Attribute> attributes;
+    std::vector<KeyAttributes> attributes;
     attributes.reserve(flags.size());
     for (std::size_t i = 0; i < flags.size(); ++i) {
         const std::size_t first = std::min(i * kWordsPerAttribute, words.size());
         attributes.push_back(unpacked(flags[i], std::span(words).subspan(first)));
     }
     if (attributes.empty())
-        attributes.push_back({.flags = kKeyLinear});
+        attributes.push_back({.flags = KeyFlag::linear});
     return attributes;
 }
 
@@ -93,9 +89,9 @@ std::vector<std::uint32_t> spreadAttributes(std::span<const std::int32_t> counts
     return indices;
 }
 
-DocumentCurve readPackedCurve(const Record& body, std::int64_t ticksPerSecond) {
-    DocumentCurve curve;
-    curve.defaultValue = body.childValue("Default").toReal();
+CurveKeys readPackedCurve(const Record& body, std::int64_t ticksPerSecond) {
+    CurveKeys curve;
+    curve.defaultValue = static_cast<float>(body.childValue("Default").toReal());
     curve.times = readAll<std::int64_t>(body, "KeyTime");
     curve.values = readAll<float>(body, "KeyValueFloat");
     const std::size_t count = std::min(curve.times.size(), curve.values.size());
@@ -104,53 +100,56 @@ DocumentCurve readPackedCurve(const Record& body, std::int64_t ticksPerSecond) {
     for (std::int64_t& time : curve.times)
         time = rescaledTicks(time, ticksPerSecond);
     curve.attributes = readAttributes(body);
-    curve.attributeIndex =
+    curve.attributeOfKey =
         spreadAttributes(readAll<std::int32_t>(body, "KeyAttrRefCount"), curve.attributes.size(), count);
-    curve.pre = readExtrapolation(body, "Pre-Extrapolation");
-    curve.post = readExtrapolation(body, "Post-Extrapolation");
+    curve.before = readExtrapolation(body, "Pre-Extrapolation");
+    curve.after = readExtrapolation(body, "Post-Extrapolation");
     sortKeys(curve);
     return curve;
 }
 
 } // namespace
 
-DocumentCurve::Extrapolation readExtrapolation(const Record& owner, std::string_view name) {
-    constexpr std::string_view kKnown = "CKRMA";
-    DocumentCurve::Extrapolation extrapolation;
+Extrapolation readExtrapolation(const Record& owner, std::string_view name) {
+    Extrapolation extrapolation;
     const Record* record = owner.child(name);
     if (!record)
         return extrapolation;
-    const char type = record->childValue("Type").toLetter();
-    if (type != 0 && kKnown.find(type) != std::string_view::npos)
-        extrapolation.type = type;
+    const char letter = record->childValue("Type").toLetter();
+    for (const ExtrapolationRow& row : kExtrapolations) {
+        if (row.letter == letter)
+            extrapolation.type = row.type;
+    }
+    if (extrapolation.type == ExtrapolationType::constant)
+        return extrapolation;
     constexpr std::int64_t kEndless = -1;
     constexpr std::int64_t kMost = 1'000'000'000;
-    extrapolation.repetitions =
-        static_cast<int>(std::clamp(record->childValue("Repetition").toInteger(kEndless), kEndless, kMost));
+    extrapolation.count =
+        static_cast<std::int32_t>(std::clamp(record->childValue("Repetition").toInteger(kEndless), kEndless, kMost));
     return extrapolation;
 }
 
-void sortKeys(DocumentCurve& curve) {
+void sortKeys(CurveKeys& curve) {
     const auto& times = curve.times;
     if (std::adjacent_find(times.begin(), times.end(), std::greater_equal<>()) == times.end())
         return;
     std::vector<std::uint32_t> order(times.size());
     std::iota(order.begin(), order.end(), 0U);
     std::stable_sort(order.begin(), order.end(), [&](std::uint32_t a, std::uint32_t b) { return times[a] < times[b]; });
-    DocumentCurve sorted;
+    CurveKeys sorted;
     for (std::size_t i = 0; i < order.size(); ++i) {
         if (i + 1 < order.size() && times[order[i]] == times[order[i + 1]])
             continue;
         sorted.times.push_back(times[order[i]]);
         sorted.values.push_back(curve.values[order[i]]);
-        sorted.attributeIndex.push_back(curve.attributeIndex[order[i]]);
+        sorted.attributeOfKey.push_back(curve.attributeOfKey[order[i]]);
     }
     curve.times = std::move(sorted.times);
     curve.values = std::move(sorted.values);
-    curve.attributeIndex = std::move(sorted.attributeIndex);
+    curve.attributeOfKey = std::move(sorted.attributeOfKey);
 }
 
-DocumentCurve readCurve(const Document& document, const DocumentObject& object) {
+CurveKeys readCurve(const Document& document, const DocumentObject& object) {
     const auto legacy = static_cast<std::size_t>(object.legacyCurve);
     if (object.legacyCurve >= 0 && legacy < document.legacyCurves.size())
         return document.legacyCurves[legacy];

@@ -15,8 +15,6 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Weights and velocities are stored as whole numbers of this unit.
-constexpr float kPackedUnit = 9999.0F;
 /// The weight that counts where the flags name none: a third.
 constexpr std::uint32_t kDefaultPackedWeight = 3333;
 
@@ -35,11 +33,11 @@ std::uint32_t packedVelocity(float velocity, bool given) {
     return static_cast<std::uint32_t>(units) & 0xFFFFU;
 }
 
-bool isTcb(const DocumentCurve::Attribute& attribute) {
-    return (attribute.flags & kKeyCubic) != 0 && (attribute.flags & kKeyTcb) != 0;
+bool isTcb(const KeyAttributes& attribute) {
+    return (attribute.flags & KeyFlag::cubic) != 0 && (attribute.flags & KeyFlag::tangentTcb) != 0;
 }
 
-void packAttribute(const DocumentCurve::Attribute& attribute, std::vector<std::uint32_t>& words) {
+void packAttribute(const KeyAttributes& attribute, std::vector<std::uint32_t>& words) {
     const auto has = [&](std::uint32_t flag) { return (attribute.flags & flag) != 0; };
     words.push_back(std::bit_cast<std::uint32_t>(attribute.data[0]));
     words.push_back(std::bit_cast<std::uint32_t>(attribute.data[1]));
@@ -48,10 +46,10 @@ void packAttribute(const DocumentCurve::Attribute& attribute, std::vector<std::u
         words.push_back(0);
         return;
     }
-    words.push_back(packedWeight(attribute.data[2], has(kKeyWeightedRight)) |
-                    packedWeight(attribute.data[3], has(kKeyWeightedNextLeft)) << 16U);
-    words.push_back(packedVelocity(attribute.data[4], has(kKeyVelocityRight)) |
-                    packedVelocity(attribute.data[5], has(kKeyVelocityNextLeft)) << 16U);
+    words.push_back(packedWeight(attribute.data[2], has(KeyFlag::weightedRight)) |
+                    packedWeight(attribute.data[3], has(KeyFlag::weightedNextLeft)) << 16U);
+    words.push_back(packedVelocity(attribute.data[4], has(KeyFlag::velocityRight)) |
+                    packedVelocity(attribute.data[5], has(KeyFlag::velocityNextLeft)) << 16U);
 }
 
 /// The keys' attributes, one entry for each run of keys that share theirs.
@@ -60,17 +58,11 @@ struct PackedAttributes {
     std::vector<std::uint32_t> words;
 };
 
-const DocumentCurve::Attribute& attributeOf(const DocumentCurve& curve, std::size_t key) {
-    static const DocumentCurve::Attribute kLinear{.flags = kKeyLinear};
-    const std::size_t index = key < curve.attributeIndex.size() ? curve.attributeIndex[key] : curve.attributes.size();
-    return index < curve.attributes.size() ? curve.attributes[index] : kLinear;
-}
-
-PackedAttributes packAttributes(const DocumentCurve& curve) {
+PackedAttributes packAttributes(const CurveKeys& curve) {
     PackedAttributes packed;
-    const DocumentCurve::Attribute* last = nullptr;
-    for (std::size_t key = 0; key < curve.times.size(); ++key) {
-        const DocumentCurve::Attribute& attribute = attributeOf(curve, key);
+    const KeyAttributes* last = nullptr;
+    for (std::size_t key = 0; key < curve.keyCount(); ++key) {
+        const KeyAttributes& attribute = curve.attributesOf(key);
         if (&attribute == last) {
             ++packed.counts.back();
             continue;
@@ -84,78 +76,76 @@ PackedAttributes packAttributes(const DocumentCurve& curve) {
 }
 
 void writeExtrapolation(RecordSink& sink, const VersionTraits& traits, std::string_view name,
-                        const DocumentCurve::Extrapolation& extrapolation) {
-    constexpr char kConstant = 'C', kRelative = 'A';
-    const bool known = extrapolation.type != kRelative || traits.relativeExtrapolation;
-    if (extrapolation.type == kConstant || !known)
+                        const Extrapolation& extrapolation) {
+    const bool known = extrapolation.type != ExtrapolationType::relativeRepetition || traits.relativeExtrapolation;
+    if (extrapolation.type == ExtrapolationType::constant || !known)
         return;
-    const BlockScope block(sink, name);
-    writeLetter(sink, "Type", extrapolation.type);
-    writeInteger(sink, "Repetition", extrapolation.repetitions);
+    for (const ExtrapolationRow& row : kExtrapolations) {
+        if (row.type != extrapolation.type)
+            continue;
+        const BlockScope block(sink, name);
+        writeLetter(sink, "Type", row.letter);
+        writeInteger(sink, "Repetition", extrapolation.count);
+    }
 }
 
-void writeExtrapolations(RecordSink& sink, const VersionTraits& traits, const DocumentCurve& curve) {
-    writeExtrapolation(sink, traits, "Pre-Extrapolation", curve.pre);
-    writeExtrapolation(sink, traits, "Post-Extrapolation", curve.post);
+void writeExtrapolations(RecordSink& sink, const VersionTraits& traits, const CurveKeys& curve) {
+    writeExtrapolation(sink, traits, "Pre-Extrapolation", curve.before);
+    writeExtrapolation(sink, traits, "Post-Extrapolation", curve.after);
+}
+
+template <class Row, std::size_t Count>
+const Row& rowOf(const Row (&rows)[Count], std::uint32_t flags) {
+    return *std::find_if(std::begin(rows), std::end(rows), [=](const Row& row) { return row.flags == flags; });
+}
+
+/// What a cubic key is written as: its tangents by user or TCB, or else automatic ones, which have no letter for more.
+std::uint32_t legacyTangent(const KeyAttributes& attribute) {
+    if (isTcb(attribute))
+        return KeyFlag::tangentTcb;
+    const bool user = (attribute.flags & KeyFlag::tangentUser) != 0;
+    return user ? attribute.flags & (KeyFlag::tangentUser | KeyFlag::genericBreak) : KeyFlag::tangentAuto;
 }
 
 /// `n`, `a,right,next left`, `r,right` or `l,next left`.
-void writeLegacyWeights(RecordSink& sink, const DocumentCurve::Attribute& attribute) {
-    constexpr struct {
-        std::uint32_t flags;
-        char letter;
-    } kModes[] = {{kKeyWeightedRight | kKeyWeightedNextLeft, 'a'},
-                  {kKeyWeightedRight, 'r'},
-                  {kKeyWeightedNextLeft, 'l'},
-                  {0, 'n'}};
-    const std::uint32_t flags = attribute.flags & (kKeyWeightedRight | kKeyWeightedNextLeft);
-    for (const auto& mode : kModes) {
-        if (mode.flags == flags)
-            sink.letter(mode.letter);
-    }
-    if ((flags & kKeyWeightedRight) != 0)
+void writeLegacyWeights(RecordSink& sink, const KeyAttributes& attribute) {
+    const std::uint32_t flags = attribute.flags & (KeyFlag::weightedRight | KeyFlag::weightedNextLeft);
+    sink.letter(rowOf(kLegacyWeights, flags).letter);
+    if ((flags & KeyFlag::weightedRight) != 0)
         sink.real(static_cast<double>(attribute.data[2]));
-    if ((flags & kKeyWeightedNextLeft) != 0)
+    if ((flags & KeyFlag::weightedNextLeft) != 0)
         sink.real(static_cast<double>(attribute.data[3]));
 }
 
-void writeLegacyCubic(RecordSink& sink, const DocumentCurve::Attribute& attribute) {
-    sink.letter('U');
-    if (isTcb(attribute)) {
-        sink.letter('t');
-        for (const float number : {attribute.data[0], attribute.data[1], attribute.data[2]})
-            sink.real(static_cast<double>(number));
-        return;
-    }
-    if ((attribute.flags & kKeyUser) == 0) {
-        sink.letter('a');
-    } else {
-        sink.letter((attribute.flags & kKeyBreak) != 0 ? 'b' : 's');
-        sink.real(static_cast<double>(attribute.data[0]));
-        sink.real(static_cast<double>(attribute.data[1]));
-    }
-    writeLegacyWeights(sink, attribute);
+void writeLegacyCubic(RecordSink& sink, const KeyAttributes& attribute) {
+    const LegacyTangentRow& row = rowOf(kLegacyTangents, legacyTangent(attribute));
+    sink.letter(kLegacyCubic);
+    sink.letter(row.letter);
+    for (std::size_t i = 0; i < row.numbers; ++i)
+        sink.real(static_cast<double>(attribute.data[i]));
+    if (!isTcb(attribute))
+        writeLegacyWeights(sink, attribute);
 }
 
-void writeLegacyMode(RecordSink& sink, const DocumentCurve::Attribute& attribute) {
-    if ((attribute.flags & kKeyConstant) != 0) {
-        sink.letter('C');
-        sink.letter((attribute.flags & kKeyConstantNext) != 0 ? 'n' : 's');
-    } else if ((attribute.flags & kKeyCubic) != 0) {
+void writeLegacyMode(RecordSink& sink, const KeyAttributes& attribute) {
+    if ((attribute.flags & KeyFlag::constant) != 0) {
+        sink.letter(kLegacyConstant);
+        sink.letter((attribute.flags & KeyFlag::constantNext) != 0 ? kLegacyConstantNext : kLegacyConstantThis);
+    } else if ((attribute.flags & KeyFlag::cubic) != 0) {
         writeLegacyCubic(sink, attribute);
     } else {
-        sink.letter('L');
+        sink.letter(kLegacyLinear);
     }
 }
 
 } // namespace
 
-void writeCurve(RecordSink& sink, const VersionTraits& traits, const DocumentCurve& curve) {
+void writeCurve(RecordSink& sink, const VersionTraits& traits, const CurveKeys& curve) {
     const PackedAttributes packed = packAttributes(curve);
-    writeReal(sink, "Default", curve.defaultValue);
+    writeReal(sink, "Default", static_cast<double>(curve.defaultValue));
     writeInteger(sink, "KeyVer", traits.keyVersion);
-    writeArray<std::int64_t>(sink, "KeyTime", curve.times);
-    writeArray<float>(sink, "KeyValueFloat", curve.values);
+    writeArray<std::int64_t>(sink, "KeyTime", std::span(curve.times).first(curve.keyCount()));
+    writeArray<float>(sink, "KeyValueFloat", std::span(curve.values).first(curve.keyCount()));
     writeArray<std::int32_t>(sink, "KeyAttrFlags", packed.flags);
     sink.beginRecord("KeyAttrDataFloat");
     sink.floatBits(packed.words);
@@ -164,17 +154,17 @@ void writeCurve(RecordSink& sink, const VersionTraits& traits, const DocumentCur
     writeExtrapolations(sink, traits, curve);
 }
 
-void writeLegacyCurve(RecordSink& sink, const VersionTraits& traits, const DocumentCurve& curve) {
-    writeReal(sink, "Default", curve.defaultValue);
-    if (curve.times.empty())
+void writeLegacyCurve(RecordSink& sink, const VersionTraits& traits, const CurveKeys& curve, double defaultValue) {
+    writeReal(sink, "Default", defaultValue);
+    if (curve.keyCount() == 0)
         return;
     writeInteger(sink, "KeyVer", traits.keyVersion);
-    writeInteger(sink, "KeyCount", static_cast<std::int32_t>(curve.times.size()));
+    writeInteger(sink, "KeyCount", static_cast<std::int32_t>(curve.keyCount()));
     sink.beginRecord("Key");
-    for (std::size_t key = 0; key < curve.times.size(); ++key) {
+    for (std::size_t key = 0; key < curve.keyCount(); ++key) {
         sink.longInteger(curve.times[key]);
         sink.real(static_cast<double>(curve.values[key]));
-        writeLegacyMode(sink, attributeOf(curve, key));
+        writeLegacyMode(sink, curve.attributesOf(key));
     }
     sink.endRecord();
     writeExtrapolations(sink, traits, curve);

@@ -14,6 +14,7 @@
 #include <vector>
 
 #include "container/Record.h"
+#include "document/CurveKeys.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -77,26 +78,6 @@ struct DocumentLightSettings {
     double fogColor[4] = {1, 1, 1, 1};
 };
 
-/// The keys of one curve in the attributes of the 7.x generation, unpacked.
-struct DocumentCurve {
-    struct Attribute {
-        std::uint32_t flags = 0; ///< interpolation, tangent, weight and velocity bits as in KeyAttrFlags
-        /// right slope (tension), next left slope (continuity), right weight (bias), next left weight,
-        /// right velocity, next left velocity
-        float data[6] = {0, 0, 1.0F / 3, 1.0F / 3, 0, 0};
-    };
-    struct Extrapolation {
-        char type = 'C';      ///< C constant, K keep slope, R repeat, M mirror, A repeat relative
-        int repetitions = -1; ///< 0: none; -1: without end
-    };
-    double defaultValue = 0;
-    std::vector<std::int64_t> times;           ///< ascending, ticks of kTicksPerSecond
-    std::vector<float> values;                 ///< one per time
-    std::vector<Attribute> attributes;         ///< distinct attributes …
-    std::vector<std::uint32_t> attributeIndex; ///< … and one index into them per key
-    Extrapolation pre, post;
-};
-
 struct Document {
     std::unique_ptr<RecordTree> tree;                  ///< owns everything the views point to
     std::uint32_t version = 0;                         ///< of the document: 3000, 5000, 5800, 6100, 7100 … 7700
@@ -109,7 +90,7 @@ struct Document {
     std::vector<DocumentObject> objects;         ///< in file order; ids are unique and not 0
     std::vector<DocumentConnection> connections; ///< in file order; both ends exist (or the root), none doubled
     std::vector<DocumentTake> takes;
-    std::vector<DocumentCurve> legacyCurves;
+    std::vector<CurveKeys> legacyCurves;
     /// What was repaired or dropped, a sentence each, with its place; bounded in number.
     std::vector<std::string> warnings;
 
@@ -125,7 +106,7 @@ struct Document {
 
 /// The keys of an object of record "AnimationCurve", whichever generation it came from. Times and values of different
 /// length are cut to the shorter; unsorted keys are sorted, of equal times the later wins.
-[[nodiscard]] DocumentCurve readCurve(const Document& document, const DocumentObject& object);
+[[nodiscard]] CurveKeys readCurve(const Document& document, const DocumentObject& object);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

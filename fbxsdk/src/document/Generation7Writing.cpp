@@ -87,7 +87,7 @@ void writeObject(const WritableObject& object, const VersionTraits& traits, Reco
     if (!object.properties.empty())
         writeProperties70(sink, object.properties);
     if (object.curve)
-        writeCurve(sink, traits, object.curve(traits));
+        object.curve(traits, [&](const CurveKeys& keys) { writeCurve(sink, traits, keys); });
     if (object.after)
         object.after(sink, traits);
     sink.endRecord();

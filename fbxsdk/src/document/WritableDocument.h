@@ -21,6 +21,8 @@ namespace detail {
 /// Writes some of an object's records. Called while the document is written, so that large arrays exist one at a time.
 using WriteRecords = std::function<void(RecordSink& sink, const VersionTraits& traits)>;
 
+using UseKeys = std::function<void(const CurveKeys& keys)>;
+
 struct WritableObject {
     std::int64_t id = 0;
     std::string_view record;    ///< "Model", "NodeAttribute", …
@@ -33,8 +35,8 @@ struct WritableObject {
     std::vector<DocumentProperty> properties;
     WriteRecords before; ///< the records before the properties …
     WriteRecords after;  ///< … and behind them; either may be empty
-    /// Of a curve: its keys, with tangents that the version has.
-    std::function<DocumentCurve(const VersionTraits& traits)> curve;
+    /// Of a curve: shows its keys, with tangents that the version has.
+    std::function<void(const VersionTraits& traits, const UseKeys& use)> curve;
 };
 
 /// Views point into the scene or into `texts`; both outlive the writing.

@@ -20,7 +20,6 @@
 #include <fbxsdk/FbxSurfaceMaterial.h>
 #include <fbxsdk/FbxTexture.h>
 
-#include "animation/CurveEvaluation.h"
 #include "geometry/DeformerReading.h"
 #include "geometry/GeometryReading.h"
 #include "io/PropertyReading.h"
@@ -93,36 +92,8 @@ void readCurveNode(const Reading& reading) {
     }
 }
 
-Extrapolation extrapolationOf(const DocumentCurve::Extrapolation& source) {
-    constexpr struct {
-        char letter;
-        ExtrapolationType type;
-    } kLetters[] = {{'R', ExtrapolationType::repetition},
-                    {'M', ExtrapolationType::mirrorRepetition},
-                    {'K', ExtrapolationType::keepSlope},
-                    {'A', ExtrapolationType::relativeRepetition}};
-    for (const auto& row : kLetters) {
-        if (row.letter == source.type)
-            return {row.type, source.repetitions};
-    }
-    return {};
-}
-
 void readCurveKeys(const Reading& reading) {
-    DocumentCurve curve = readCurve(*reading.document, reading.source);
-    CurveKeys& keys = reading.as<FbxAnimCurve>().editKeys();
-    keys.defaultValue = static_cast<float>(curve.defaultValue);
-    keys.times = std::move(curve.times);
-    keys.values = std::move(curve.values);
-    keys.attributeOfKey = std::move(curve.attributeIndex);
-    keys.attributes.reserve(curve.attributes.size());
-    for (const DocumentCurve::Attribute& attribute : curve.attributes) {
-        KeyAttributes& added = keys.attributes.emplace_back();
-        added.flags = attribute.flags;
-        std::copy(std::begin(attribute.data), std::end(attribute.data), added.data.begin());
-    }
-    keys.before = extrapolationOf(curve.pre);
-    keys.after = extrapolationOf(curve.post);
+    reading.as<FbxAnimCurve>().editKeys() = readCurve(*reading.document, reading.source);
 }
 
 void readMaterial(const Reading& reading) {

@@ -257,7 +257,12 @@ void writeCurveNode(const Writing& writing) {
 void writeCurveKeys(const Writing& writing) {
     auto& curve = writing.as<FbxAnimCurve>();
     writing.target.name = {}; // files give curves no names
-    writing.target.curve = [&curve](const VersionTraits& traits) { return documentCurve(curve.keys(), traits); };
+    writing.target.curve = [&curve](const VersionTraits& traits, const UseKeys& use) {
+        if (traits.idsAndTemplates)
+            use(curve.keys());
+        else
+            use(legacyKeys(curve.keys()));
+    };
 }
 
 void writeGeometry(const Writing& writing) {

@@ -214,8 +214,14 @@ void writeTakes(const std::vector<ChosenObject>& objects, WritableDocument& docu
             continue;
         const WrittenSpan local = writtenSpan(stack->GetLocalTimeSpan(), *stack);
         const WrittenSpan reference = writtenSpan(stack->GetReferenceTimeSpan(), *stack);
-        document.takes.push_back({stack->GetName(), {}, local.start, local.stop, reference.start, reference.stop,
-                                  /*hasLocal*/ true, /*hasReference*/ true});
+        document.takes.push_back({stack->GetName(),
+                                  {},
+                                  local.start,
+                                  local.stop,
+                                  reference.start,
+                                  reference.stop,
+                                  /*hasLocal*/ true,
+                                  /*hasReference*/ true});
     }
 }
 

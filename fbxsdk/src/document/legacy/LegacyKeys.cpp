@@ -11,34 +11,6 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// What stands behind the letters of a cubic key, by its tangent letter.
-struct CubicMode {
-    char letter;
-    std::uint32_t flags;
-    int numbers; ///< how many numbers follow …
-    bool kept;   ///< … and whether they are the first of Attribute::data; automatic tangents are computed anew
-};
-constexpr CubicMode kCubicModes[] = {
-    {'s', kKeyUser, 2, true},                         // right slope, left slope of the next key
-    {'b', kKeyUser | kKeyBreak, 2, true},             // the same, broken
-    {'a', kKeyAuto, 0, false},                        //
-    {'p', kKeyAuto | kKeyClampProgressive, 2, false}, // slopes
-    {'q', kKeyAuto | kKeyClamp, 2, false},            // slopes
-    {'t', kKeyTcb, 3, true},                          // tension, continuity, bias
-    {'d', kKeyAuto | kKeyBreak, 1, false},            // a slope
-};
-
-struct WeightMode {
-    char letter;
-    std::uint32_t flags;
-};
-constexpr WeightMode kWeightModes[] = {
-    {'n', 0}, {'a', kKeyWeightedRight | kKeyWeightedNextLeft}, {'r', kKeyWeightedRight}, {'l', kKeyWeightedNextLeft},
-    {'c', 0},
-};
-constexpr int kRightWeight = 2;
-constexpr int kNextLeftWeight = 3;
-
 /// Reads key by key. Whether a letter follows is seen from the list itself: versions of the format differ in what they
 /// leave out, but the next key always begins with a number.
 class KeyList {
@@ -48,7 +20,7 @@ public:
     [[nodiscard]] bool atEnd() const { return mNext == mValues.size(); }
 
     /// False when the list does not hold a key at this place.
-    bool read(std::int64_t& time, float& value, DocumentCurve::Attribute& attribute) {
+    bool read(std::int64_t& time, float& value, KeyAttributes& attribute) {
         if (atEnd() || !mValues[mNext].isNumber())
             return false;
         time = mValues[mNext++].toInteger();
@@ -78,43 +50,43 @@ private:
         return true;
     }
 
-    bool readMode(DocumentCurve::Attribute& attribute) {
+    bool readMode(KeyAttributes& attribute) {
         char letter = 0;
         if (!readLetter(letter))
             return false;
         switch (letter) {
-        case 'L':
-            attribute.flags = kKeyLinear;
+        case kLegacyLinear:
+            attribute.flags = KeyFlag::linear;
             return true;
-        case 'C':
+        case kLegacyConstant:
             return readConstant(attribute);
-        case 'U':
+        case kLegacyCubic:
             return readCubic(attribute);
         default:
             return false;
         }
     }
 
-    bool readConstant(DocumentCurve::Attribute& attribute) {
-        attribute.flags = kKeyConstant;
+    bool readConstant(KeyAttributes& attribute) {
+        attribute.flags = KeyFlag::constant;
         char which = 0;
         if (!readLetter(which))
             return true; // the oldest files have the standard kind only
-        if (which == 'n')
-            attribute.flags |= kKeyConstantNext;
-        return which == 'n' || which == 's';
+        if (which == kLegacyConstantNext)
+            attribute.flags |= KeyFlag::constantNext;
+        return which == kLegacyConstantNext || which == kLegacyConstantThis;
     }
 
-    bool readCubic(DocumentCurve::Attribute& attribute) {
+    bool readCubic(KeyAttributes& attribute) {
         char letter = 0;
         if (!readLetter(letter))
             return false;
-        const auto* mode = std::find_if(std::begin(kCubicModes), std::end(kCubicModes),
-                                        [&](const CubicMode& row) { return row.letter == letter; });
-        if (mode == std::end(kCubicModes))
+        const auto* mode = std::find_if(std::begin(kLegacyTangents), std::end(kLegacyTangents),
+                                        [&](const LegacyTangentRow& row) { return row.letter == letter; });
+        if (mode == std::end(kLegacyTangents))
             return false;
-        attribute.flags = kKeyCubic | mode->flags;
-        for (int i = 0; i < mode->numbers; ++i) {
+        attribute.flags = KeyFlag::cubic | mode->flags;
+        for (std::size_t i = 0; i < mode->numbers; ++i) {
             double number = 0;
             if (!readNumber(number))
                 return false;
@@ -127,19 +99,19 @@ private:
         return true;
     }
 
-    bool readWeights(DocumentCurve::Attribute& attribute) {
+    bool readWeights(KeyAttributes& attribute) {
         char letter = 0;
         readLetter(letter);
-        const auto* mode = std::find_if(std::begin(kWeightModes), std::end(kWeightModes),
-                                        [&](const WeightMode& row) { return row.letter == letter; });
-        if (mode == std::end(kWeightModes))
+        const auto* mode = std::find_if(std::begin(kLegacyWeights), std::end(kLegacyWeights),
+                                        [&](const LegacyWeightRow& row) { return row.letter == letter; });
+        if (mode == std::end(kLegacyWeights))
             return false;
         attribute.flags |= mode->flags;
-        return readWeight(attribute, mode->flags & kKeyWeightedRight, kRightWeight) &&
-               readWeight(attribute, mode->flags & kKeyWeightedNextLeft, kNextLeftWeight);
+        return readWeight(attribute, mode->flags & KeyFlag::weightedRight, KeyData::rightWeight) &&
+               readWeight(attribute, mode->flags & KeyFlag::weightedNextLeft, KeyData::nextLeftWeight);
     }
 
-    bool readWeight(DocumentCurve::Attribute& attribute, std::uint32_t present, int index) {
+    bool readWeight(KeyAttributes& attribute, std::uint32_t present, std::size_t index) {
         double weight = 0;
         if (present == 0)
             return true;
@@ -154,17 +126,19 @@ private:
 };
 
 /// False when the list does not hold whole keys, or not as many as the channel says.
-bool readKeys(DocumentBuilder& builder, const Record& channel, const Record& keys, DocumentCurve& curve) {
+bool readKeys(DocumentBuilder& builder, const Record& channel, const Record& keys, CurveKeys& curve) {
     KeyList list(keys.values);
     while (!list.atEnd()) {
         std::int64_t time = 0;
         float value = 0;
-        DocumentCurve::Attribute attribute;
+        KeyAttributes attribute;
         if (!list.read(time, value, attribute))
             return false;
         curve.times.push_back(builder.ticks(time));
         curve.values.push_back(value);
-        appendAttribute(curve, attribute);
+        if (curve.attributes.empty() || curve.attributes.back() != attribute)
+            curve.attributes.push_back(attribute);
+        curve.attributeOfKey.push_back(static_cast<std::uint32_t>(curve.attributes.size() - 1));
     }
     const Record* count = channel.child("KeyCount");
     return !count || std::cmp_equal(count->value(0).toInteger(), curve.times.size());
@@ -172,45 +146,50 @@ bool readKeys(DocumentBuilder& builder, const Record& channel, const Record& key
 
 /// Automatic keys are flat at both ends of a curve, as applications show what they write with the letter 'a': what 7.x
 /// files say of such keys is that their tangents are clamped progressively.
-void flattenEnd(DocumentCurve& curve, std::size_t key) {
-    constexpr std::uint32_t kModes = kKeyCubic | kKeyAuto | kKeyTcb | kKeyUser | kKeyBreak | kKeyClamp;
-    std::uint32_t& index = curve.attributeIndex[key];
-    if ((curve.attributes[index].flags & kModes) != (kKeyCubic | kKeyAuto))
+void flattenEnd(CurveKeys& curve, std::size_t key) {
+    constexpr std::uint32_t kModes = KeyFlag::cubic | KeyFlag::tangentAuto | KeyFlag::tangentTcb |
+                                     KeyFlag::tangentUser | KeyFlag::genericBreak | KeyFlag::genericClamp;
+    std::uint32_t& index = curve.attributeOfKey[key];
+    if ((curve.attributes[index].flags & kModes) != (KeyFlag::cubic | KeyFlag::tangentAuto))
         return;
-    const bool shared = std::count(curve.attributeIndex.begin(), curve.attributeIndex.end(), index) > 1;
+    const bool shared = std::count(curve.attributeOfKey.begin(), curve.attributeOfKey.end(), index) > 1;
     if (shared) {
         curve.attributes.push_back(curve.attributes[index]);
         index = static_cast<std::uint32_t>(curve.attributes.size() - 1);
     }
-    curve.attributes[index].flags |= kKeyClampProgressive;
+    curve.attributes[index].flags |= KeyFlag::genericClampProgressive;
+}
+
+void scaleValues(CurveKeys& curve, double scale) {
+    const auto factor = static_cast<float>(scale);
+    for (float& value : curve.values)
+        value *= factor;
+    for (KeyAttributes& attribute : curve.attributes)
+        if (attribute.flags & KeyFlag::tangentUser) {
+            attribute.data[KeyData::rightSlope] *= factor;
+            attribute.data[KeyData::nextLeftSlope] *= factor;
+        }
 }
 
 } // namespace
 
-void appendAttribute(DocumentCurve& curve, const DocumentCurve::Attribute& attribute) {
-    const auto same = [&](const DocumentCurve::Attribute& last) {
-        return last.flags == attribute.flags && std::equal(std::begin(last.data), std::end(last.data), attribute.data);
-    };
-    if (curve.attributes.empty() || !same(curve.attributes.back()))
-        curve.attributes.push_back(attribute);
-    curve.attributeIndex.push_back(static_cast<std::uint32_t>(curve.attributes.size() - 1));
-}
-
-std::optional<DocumentCurve> readLegacyCurve(DocumentBuilder& builder, const Record& channel) {
+std::optional<CurveKeys> readLegacyCurve(DocumentBuilder& builder, const Record& channel, double scale) {
     const Record* keys = channel.child("Key");
     if (!keys || keys->values.empty())
         return std::nullopt;
-    DocumentCurve curve;
-    curve.defaultValue = channel.childValue("Default").toReal();
+    CurveKeys curve;
+    curve.defaultValue = static_cast<float>(channel.childValue("Default").toReal() * scale);
     if (!readKeys(builder, channel, *keys, curve)) {
         builder.warn(*keys, "the keys do not add up; the curve is left out.");
         return std::nullopt;
     }
-    curve.pre = readExtrapolation(channel, "Pre-Extrapolation");
-    curve.post = readExtrapolation(channel, "Post-Extrapolation");
+    curve.before = readExtrapolation(channel, "Pre-Extrapolation");
+    curve.after = readExtrapolation(channel, "Post-Extrapolation");
     sortKeys(curve);
     flattenEnd(curve, 0);
     flattenEnd(curve, curve.times.size() - 1);
+    if (scale != 1)
+        scaleValues(curve, scale);
     return curve;
 }
 

@@ -88,18 +88,6 @@ void addNamed(LegacyObjects& objects, std::int64_t object, const Record& record,
     channels.push_back(std::move(channel));
 }
 
-void scaleCurve(DocumentCurve& curve, double scale) {
-    const auto factor = static_cast<float>(scale);
-    curve.defaultValue *= scale;
-    for (float& value : curve.values)
-        value *= factor;
-    for (DocumentCurve::Attribute& attribute : curve.attributes)
-        if (attribute.flags & kKeyUser) {
-            attribute.data[0] *= factor;
-            attribute.data[1] *= factor;
-        }
-}
-
 /// One take on its way into the document.
 class TakeReader {
 public:
@@ -122,10 +110,10 @@ private:
     }
 
     void readChannel(const LegacyChannel& channel) {
-        std::vector<std::optional<DocumentCurve>> curves;
+        std::vector<std::optional<CurveKeys>> curves;
         bool keyed = false;
         for (const ChannelComponent& component : channel.components) {
-            curves.push_back(readLegacyCurve(mBuilder, *component.record));
+            curves.push_back(readLegacyCurve(mBuilder, *component.record, channel.scale));
             keyed = keyed || curves.back();
         }
         // A channel without keys says nothing unless it differs from what the object has anyway.
@@ -152,7 +140,7 @@ private:
         return std::abs(value - componentDefault(channel, component)) <= kTolerance * std::max(1.0, std::abs(value));
     }
 
-    void addNode(const LegacyChannel& channel, std::vector<std::optional<DocumentCurve>>& curves) {
+    void addNode(const LegacyChannel& channel, std::vector<std::optional<CurveKeys>>& curves) {
         const std::int64_t node = mBuilder.newId();
         DocumentObject& object = mBuilder.addObject(node, "AnimationCurveNode", "", channel.nodeName);
         for (const ChannelComponent& component : channel.components)
@@ -163,12 +151,10 @@ private:
         mBuilder.connect(node, channel.owner, channel.property);
         for (std::size_t i = 0; i < curves.size(); ++i)
             if (curves[i])
-                addCurve(node, channel.components[i].label, channel.scale, std::move(*curves[i]));
+                addCurve(node, channel.components[i].label, std::move(*curves[i]));
     }
 
-    void addCurve(std::int64_t node, std::string_view label, double scale, DocumentCurve curve) {
-        if (scale != 1)
-            scaleCurve(curve, scale);
+    void addCurve(std::int64_t node, std::string_view label, CurveKeys curve) {
         const std::int64_t id = mBuilder.newId();
         DocumentObject& object = mBuilder.addObject(id, "AnimationCurve", "", "");
         object.legacyCurve = static_cast<int>(mBuilder.document().legacyCurves.size());

@@ -155,11 +155,12 @@ private:
 
     void writeKeys(const DrivenProperty& driven, const DocumentProperty& component) {
         const auto found = driven.curves.find(component.name);
-        DocumentCurve curve;
+        const double value = component.values.empty() ? 0.0 : component.values.front().toReal();
+        const auto write = [&](const CurveKeys& keys) { writeLegacyCurve(mSink, mTraits, keys, value); };
         if (found != driven.curves.end())
-            curve = found->second->curve(mTraits);
-        curve.defaultValue = component.values.empty() ? 0.0 : component.values.front().toReal();
-        writeLegacyCurve(mSink, mTraits, curve);
+            found->second->curve(mTraits, write);
+        else
+            write({});
         writeColor();
     }
 

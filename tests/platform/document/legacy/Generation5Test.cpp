@@ -86,7 +86,7 @@ TEST(Generation5, ScalesKeyedVisibilitiesFromPercent) {
             KeyVer: 4002
             KeyCount: 1
             Key: 0,50,U,s,10,20,n } } } })");
-    const DocumentCurve& curve = document->legacyCurves.at(0);
+    const CurveKeys& curve = document->legacyCurves.at(0);
     EXPECT_EQ(curve.values, std::vector<float>{0.5F});
     EXPECT_EQ(curve.defaultValue, 1);
     EXPECT_FLOAT_EQ(curve.attributes.at(0).data[1], 0.2F);
