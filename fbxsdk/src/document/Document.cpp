@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Look-ups in a finished document.
+// Look-ups in a document.
 #include "document/Document.h"
 
 #include <algorithm>
@@ -15,10 +15,16 @@ const DocumentProperty* DocumentObject::property(std::string_view propertyName) 
     return found == properties.rend() ? nullptr : &*found;
 }
 
-const DocumentObject* Document::find(std::int64_t id) const {
-    const auto found = std::lower_bound(idIndex.begin(), idIndex.end(), id,
+const DocumentObject* Document::find(std::int64_t objectId) const {
+    const auto found = std::lower_bound(idIndex.begin(), idIndex.end(), objectId,
                                         [](const auto& entry, std::int64_t wanted) { return entry.first < wanted; });
-    return found != idIndex.end() && found->first == id ? &objects[found->second] : nullptr;
+    return found != idIndex.end() && found->first == objectId ? &objects[found->second] : nullptr;
+}
+
+std::span<const Value> Document::keep(std::initializer_list<Value> values) {
+    const std::span<Value> kept = tree->newValues(values.size());
+    std::copy(values.begin(), values.end(), kept.begin());
+    return kept;
 }
 
 } // namespace detail

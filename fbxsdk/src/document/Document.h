@@ -6,18 +6,23 @@
 #pragma once
 
 #include <cstdint>
-#include <map>
+#include <functional>
+#include <initializer_list>
 #include <memory>
 #include <span>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "container/FileId.h"
 #include "container/Record.h"
 #include "document/CurveKeys.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
+
+class RecordSink;
+struct VersionTraits;
 
 /// Ticks of one second in everything behind this stage, whatever unit the file counts in.
 inline constexpr std::int64_t kTicksPerSecond = 46186158000;
@@ -31,15 +36,33 @@ struct DocumentProperty {
     std::span<const Value> values; ///< times (type "KTime") are already in ticks of kTicksPerSecond
 };
 
+/// Writes some of an object's records. Called while the document is written, so that large arrays exist one at a time.
+using WriteRecords = std::function<void(RecordSink& sink, const VersionTraits& traits)>;
+using UseKeys = std::function<void(const CurveKeys& keys)>;
+
+/// What an object that is to be written has where one that was read has its sub-records.
+struct ObjectContent {
+    std::string_view nameClass; ///< what stands before "::" in its name
+    /// The class whose template would hold the defaults; empty for a class without one.
+    std::string_view templateClass;
+    WriteRecords before; ///< the records before the properties …
+    WriteRecords after;  ///< … and behind them; either may be empty
+    /// Of a curve: shows its keys, with tangents that the version has.
+    std::function<void(const VersionTraits& traits, const UseKeys& use)> curve;
+};
+
 /// One object. Names and spellings are those of the 7.x generation.
 struct DocumentObject {
     std::int64_t id = 0;
     std::string_view record;   ///< "Model", "NodeAttribute", "Geometry", "Deformer", "Material", "AnimationCurve", …
     std::string_view subClass; ///< "Mesh", "Camera", "LimbNode", "Skin", "Cluster", … may be empty
     std::string_view name;     ///< without the class prefix; may be empty; bytes as in the file
+    /// To be written from 7.x on: those that differ from the defaults, before that all of them.
     std::vector<DocumentProperty> properties;
-    /// The object's sub-records in 7.x spelling (Vertices, LayerElementNormal, Shading, Indexes, …). Never null.
+    /// The object's sub-records in 7.x spelling (Vertices, LayerElementNormal, Shading, Indexes, …). Never null in a
+    /// document that was read.
     const Record* body = nullptr;
+    std::unique_ptr<ObjectContent> content{}; ///< never null in a document that is to be written
     /// Index into Document::legacyCurves for a curve translated from a take; -1 for one that `body` describes.
     int legacyCurve = -1;
 
@@ -78,11 +101,15 @@ struct DocumentLightSettings {
     double fogColor[4] = {1, 1, 1, 1};
 };
 
+/// What was read, or is to be written. Views point into `tree`, or into the scene that is written.
 struct Document {
-    std::unique_ptr<RecordTree> tree;                  ///< owns everything the views point to
+    std::unique_ptr<RecordTree> tree;                  ///< owns values and texts
     std::uint32_t version = 0;                         ///< of the document: 3000, 5000, 5800, 6100, 7100 … 7700
     std::int64_t fileTicksPerSecond = kTicksPerSecond; ///< unit of the times that readCurve still finds in the tree
     std::string creator;
+    CreationTime created;    ///< to be written: as the file states it …
+    CreationTime createdGmt; ///< … and the same moment at Greenwich
+    std::int64_t id = 0;     ///< to be written: that of the document itself
     std::vector<DocumentProperty> globalSettings;
     DocumentLightSettings lightSettings;
     std::string activeStackName;
@@ -94,7 +121,9 @@ struct Document {
     /// What was repaired or dropped, a sentence each, with its place; bounded in number.
     std::vector<std::string> warnings;
 
-    [[nodiscard]] const DocumentObject* find(std::int64_t id) const;
+    [[nodiscard]] const DocumentObject* find(std::int64_t objectId) const;
+    /// Keeps values for a property.
+    [[nodiscard]] std::span<const Value> keep(std::initializer_list<Value> values);
 
     std::vector<std::pair<std::int64_t, std::uint32_t>> idIndex; ///< sorted; filled by readDocument
 };
@@ -103,6 +132,10 @@ struct Document {
 [[nodiscard]] std::unique_ptr<Document> readDocument(const std::string& fileName, FbxStatus& status);
 /// The same from a record tree that is already there.
 [[nodiscard]] std::unique_ptr<Document> readDocument(std::unique_ptr<RecordTree> tree, FbxStatus& status);
+
+/// Writes all records of the document, of the generation that the traits tell. Stops early when the sink fails; whether
+/// it did, the sink says.
+void writeDocument(Document& document, const VersionTraits& traits, RecordSink& sink);
 
 /// The keys of an object of record "AnimationCurve", whichever generation it came from. Times and values of different
 /// length are cut to the shorter; unsorted keys are sorted, of equal times the later wins.

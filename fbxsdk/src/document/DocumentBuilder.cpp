@@ -92,11 +92,7 @@ void DocumentBuilder::warn(const Record& record, const std::string& sentence) {
     warn(tree().placeOf(record) + ": " + sentence);
 }
 
-std::span<const Value> DocumentBuilder::keep(std::initializer_list<Value> values) {
-    const std::span<Value> kept = tree().newValues(values.size());
-    std::copy(values.begin(), values.end(), kept.begin());
-    return kept;
-}
+std::span<const Value> DocumentBuilder::keep(std::initializer_list<Value> values) { return mDocument->keep(values); }
 
 std::span<const Value> DocumentBuilder::keepReals(std::span<const double> numbers) {
     const std::span<Value> kept = tree().newValues(numbers.size());

@@ -5,6 +5,7 @@
 #include "document/DocumentSections.h"
 
 #include <algorithm>
+#include <optional>
 #include <unordered_map>
 
 #include "document/PropertyWriting.h"
@@ -24,7 +25,7 @@ void writeTimeStamp(const CreationTime& time, RecordSink& sink) {
 }
 
 /// Old applications restore their view from this.
-void writeCameraResolution(const WritableDocument& document, RecordSink& sink) {
+void writeCameraResolution(const Document& document, RecordSink& sink) {
     const DocumentProperty* camera = findProperty(document.globalSettings, "DefaultCamera");
     const BlockScope block(sink, "CurrentCameraResolution");
     writeText(sink, "CameraName", camera && !camera->values.empty() ? camera->values[0].toText() : std::string_view());
@@ -41,29 +42,25 @@ void writeMetaData(RecordSink& sink) {
 }
 
 /// Who made the scene first and who saved it last, which here is the same.
-std::vector<DocumentProperty> originOf(const WritableDocument& document, const std::string& gmt,
-                                       std::vector<std::array<Value, 1>>& values) {
+std::vector<DocumentProperty> originOf(std::string_view gmt, std::vector<std::array<Value, 1>>& values) {
     struct Row {
         std::string_view name, typeName, subTypeName;
-        const std::string* text; ///< null for what holds nothing itself
+        std::optional<std::string_view> text; ///< none for what holds nothing itself
     };
-    const std::string& vendor = document.applicationVendor;
-    const std::string& name = document.applicationName;
-    const std::string& version = document.applicationVersion;
-    const std::string nowhere; // the same scene gives the same bytes wherever it is saved
-    const Row rows[] = {{"DocumentUrl", "KString", "Url", &nowhere},
-                        {"SrcDocumentUrl", "KString", "Url", &nowhere},
-                        {"Original", "Compound", "", nullptr},
-                        {"Original|ApplicationVendor", "KString", "", &vendor},
-                        {"Original|ApplicationName", "KString", "", &name},
-                        {"Original|ApplicationVersion", "KString", "", &version},
-                        {"Original|DateTime_GMT", "DateTime", "", &gmt},
-                        {"Original|FileName", "KString", "", &nowhere},
-                        {"LastSaved", "Compound", "", nullptr},
-                        {"LastSaved|ApplicationVendor", "KString", "", &vendor},
-                        {"LastSaved|ApplicationName", "KString", "", &name},
-                        {"LastSaved|ApplicationVersion", "KString", "", &version},
-                        {"LastSaved|DateTime_GMT", "DateTime", "", &gmt}};
+    constexpr std::string_view kUnstated = ""; // the same scene gives the same bytes whatever saves it, and wherever
+    const Row rows[] = {{"DocumentUrl", "KString", "Url", kUnstated},
+                        {"SrcDocumentUrl", "KString", "Url", kUnstated},
+                        {"Original", "Compound", "", std::nullopt},
+                        {"Original|ApplicationVendor", "KString", "", kUnstated},
+                        {"Original|ApplicationName", "KString", "", kUnstated},
+                        {"Original|ApplicationVersion", "KString", "", kUnstated},
+                        {"Original|DateTime_GMT", "DateTime", "", gmt},
+                        {"Original|FileName", "KString", "", kUnstated},
+                        {"LastSaved", "Compound", "", std::nullopt},
+                        {"LastSaved|ApplicationVendor", "KString", "", kUnstated},
+                        {"LastSaved|ApplicationName", "KString", "", kUnstated},
+                        {"LastSaved|ApplicationVersion", "KString", "", kUnstated},
+                        {"LastSaved|DateTime_GMT", "DateTime", "", gmt}};
     values.reserve(std::size(rows));
     std::vector<DocumentProperty> properties;
     for (const Row& row : rows) {
@@ -83,10 +80,10 @@ const DocumentProperty* findProperty(std::span<const DocumentProperty> propertie
     return found == properties.end() ? nullptr : &*found;
 }
 
-void writeSceneInfo(const WritableDocument& document, const VersionTraits& traits, RecordSink& sink) {
+void writeSceneInfo(const Document& document, const VersionTraits& traits, RecordSink& sink) {
     std::vector<std::array<Value, 1>> values;
     const std::string gmt = document.createdGmt.dayFirstText();
-    const std::vector<DocumentProperty> origin = originOf(document, gmt, values);
+    const std::vector<DocumentProperty> origin = originOf(gmt, values);
     sink.beginRecord("SceneInfo");
     sink.objectName("SceneInfo", "GlobalInfo");
     sink.text("UserData");
@@ -94,7 +91,7 @@ void writeSceneInfo(const WritableDocument& document, const VersionTraits& trait
     writeText(sink, "Type", "UserData");
     writeInteger(sink, "Version", 100);
     writeMetaData(sink);
-    if (traits.idsAndTemplates) {
+    if (traits.generation == 7) {
         writeProperties70(sink, origin);
     } else {
         const BlockScope block(sink, "Properties60");
@@ -104,18 +101,18 @@ void writeSceneInfo(const WritableDocument& document, const VersionTraits& trait
     sink.endRecord();
 }
 
-void writeHeader(const WritableDocument& document, const VersionTraits& traits, RecordSink& sink) {
+void writeHeader(const Document& document, const VersionTraits& traits, RecordSink& sink) {
     {
         const BlockScope block(sink, "FBXHeaderExtension");
         writeInteger(sink, "FBXHeaderVersion", 1003);
         writeInteger(sink, "FBXVersion", static_cast<std::int32_t>(traits.version));
         if (sink.isBinary())
             writeInteger(sink, "EncryptionType", 0);
-        if (!traits.idsAndTemplates)
+        if (traits.views)
             writeCameraResolution(document, sink);
         writeTimeStamp(document.created, sink);
         writeText(sink, "Creator", document.creator);
-        if (traits.idsAndTemplates)
+        if (traits.generation == 7)
             writeSceneInfo(document, traits, sink);
     }
     if (!sink.isBinary())
@@ -128,10 +125,10 @@ void writeHeader(const WritableDocument& document, const VersionTraits& traits, 
     writeText(sink, "Creator", document.creator);
 }
 
-std::vector<ObjectCount> countObjects(const WritableDocument& document) {
+std::vector<ObjectCount> countObjects(const Document& document) {
     std::vector<ObjectCount> counts;
     std::unordered_map<std::string_view, std::size_t> places;
-    for (const WritableObject& object : document.objects) {
+    for (const DocumentObject& object : document.objects) {
         const auto [place, isNew] = places.emplace(object.record, counts.size());
         if (isNew)
             counts.push_back({object.record, 0, &object});

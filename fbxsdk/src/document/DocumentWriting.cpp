@@ -8,10 +8,10 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-void writeDocument(WritableDocument& document, const VersionTraits& traits, RecordSink& sink) {
+void writeDocument(Document& document, const VersionTraits& traits, RecordSink& sink) {
     if (traits.inlineShapes)
         moveShapesInline(document);
-    if (traits.idsAndTemplates)
+    if (traits.generation == 7)
         writeGeneration7(document, traits, sink);
     else
         writeGeneration6(document, traits, sink);

@@ -14,13 +14,13 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-void writeGlobalSettings(const WritableDocument& document, RecordSink& sink) {
+void writeGlobalSettings(const Document& document, RecordSink& sink) {
     const BlockScope block(sink, "GlobalSettings");
     writeInteger(sink, "Version", 1000);
     writeProperties70(sink, document.globalSettings);
 }
 
-void writeDocuments(const WritableDocument& document, RecordSink& sink) {
+void writeDocuments(const Document& document, RecordSink& sink) {
     const Value activeStack[] = {Value::ofText(document.activeStackName)};
     const DocumentProperty properties[] = {{"SourceObject", "object", "", "", {}},
                                            {"ActiveAnimStackName", "KString", "", "", activeStack}};
@@ -42,15 +42,15 @@ void writeReferences(RecordSink& sink) {
     const BlockScope block(sink, "References");
 }
 
-const DocumentTemplate* templateOf(const WritableDocument& document, const WritableObject& object) {
+const DocumentTemplate* templateOf(const Document& document, const DocumentObject& object) {
     const auto found = std::find_if(document.templates.begin(), document.templates.end(), [&](const auto& each) {
-        return each.record == object.record && each.className == object.templateClass;
+        return each.record == object.record && each.className == object.content->templateClass;
     });
     return found == document.templates.end() ? nullptr : &*found;
 }
 
 /// A kind has at most one template: that of its first object's class.
-void writeObjectType(const WritableDocument& document, const ObjectCount& kind, RecordSink& sink) {
+void writeObjectType(const Document& document, const ObjectCount& kind, RecordSink& sink) {
     const BlockScope block(sink, "ObjectType", kind.record);
     writeInteger(sink, "Count", kind.count);
     const DocumentTemplate* defaults = kind.first ? templateOf(document, *kind.first) : nullptr;
@@ -62,7 +62,7 @@ void writeObjectType(const WritableDocument& document, const ObjectCount& kind, 
 
 bool isTake(const ObjectCount& kind) { return kind.record == "AnimationStack" || kind.record == "AnimationLayer"; }
 
-void writeDefinitions(const WritableDocument& document, RecordSink& sink) {
+void writeDefinitions(const Document& document, RecordSink& sink) {
     std::vector<ObjectCount> kinds = countObjects(document);
     std::stable_partition(kinds.begin(), kinds.end(), isTake);
     sink.heading("Object definitions");
@@ -76,27 +76,27 @@ void writeDefinitions(const WritableDocument& document, RecordSink& sink) {
         writeObjectType(document, kind, sink);
 }
 
-void writeObject(const WritableObject& object, const VersionTraits& traits, RecordSink& sink) {
+void writeObject(const DocumentObject& object, const VersionTraits& traits, RecordSink& sink) {
     sink.beginRecord(object.record);
     sink.longInteger(object.id);
-    sink.objectName(object.nameClass, object.name);
+    sink.objectName(object.content->nameClass, object.name);
     sink.text(object.subClass);
     sink.beginBlock();
-    if (object.before)
-        object.before(sink, traits);
+    if (object.content->before)
+        object.content->before(sink, traits);
     if (!object.properties.empty())
         writeProperties70(sink, object.properties);
-    if (object.curve)
-        object.curve(traits, [&](const CurveKeys& keys) { writeCurve(sink, traits, keys); });
-    if (object.after)
-        object.after(sink, traits);
+    if (object.content->curve)
+        object.content->curve(traits, [&](const CurveKeys& keys) { writeCurve(sink, traits, keys); });
+    if (object.content->after)
+        object.content->after(sink, traits);
     sink.endRecord();
 }
 
-void writeObjects(const WritableDocument& document, const VersionTraits& traits, RecordSink& sink) {
+void writeObjects(const Document& document, const VersionTraits& traits, RecordSink& sink) {
     sink.heading("Object properties");
     const BlockScope block(sink, "Objects");
-    for (const WritableObject& object : document.objects) {
+    for (const DocumentObject& object : document.objects) {
         if (sink.failed())
             return;
         writeObject(object, traits, sink);
@@ -117,14 +117,14 @@ void writeConnection(const DocumentConnection& connection, RecordSink& sink) {
     sink.endRecord();
 }
 
-void writeConnections(const WritableDocument& document, RecordSink& sink) {
+void writeConnections(const Document& document, RecordSink& sink) {
     sink.heading("Object connections");
     const BlockScope block(sink, "Connections");
     for (const DocumentConnection& connection : document.connections)
         writeConnection(connection, sink);
 }
 
-void writeTakes(const WritableDocument& document, RecordSink& sink) {
+void writeTakes(const Document& document, RecordSink& sink) {
     sink.heading("Takes section");
     const BlockScope block(sink, "Takes");
     writeText(sink, "Current", document.activeStackName);
@@ -136,7 +136,7 @@ void writeTakes(const WritableDocument& document, RecordSink& sink) {
 
 } // namespace
 
-void writeGeneration7(const WritableDocument& document, const VersionTraits& traits, RecordSink& sink) {
+void writeGeneration7(const Document& document, const VersionTraits& traits, RecordSink& sink) {
     writeHeader(document, traits, sink);
     writeGlobalSettings(document, sink);
     writeDocuments(document, sink);

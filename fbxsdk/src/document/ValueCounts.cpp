@@ -8,6 +8,8 @@
 #include <iterator>
 #include <string_view>
 
+#include "schema/PropertyFlags.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
@@ -63,7 +65,7 @@ constexpr ListRow kLists[] = {{"Properties70", "P", 4}, {"Properties60", "Proper
 bool hasTooMany(const Record& line, std::size_t texts) {
     const auto* const type = std::find_if(std::begin(kTypes), std::end(kTypes),
                                           [&](const TypeRow& row) { return row.typeName == line.value(1).toText(); });
-    const bool user = line.value(texts - 1).toText().find('U') != std::string_view::npos;
+    const bool user = line.value(texts - 1).toText().find(kUserFlagLetter) != std::string_view::npos;
     if (type == std::end(kTypes) || user || line.values.size() <= texts)
         return false;
     const auto values = line.values.subspan(texts);

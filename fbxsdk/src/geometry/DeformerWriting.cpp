@@ -34,7 +34,7 @@ std::string_view skinningName(FbxSkin::EType type) {
 
 void writeSkin(const FbxSkin& skin, const VersionTraits& traits, RecordSink& sink) {
     writeReal(sink, "Link_DeformAcuracy", skin.GetDeformAccuracy());
-    if (traits.idsAndTemplates)
+    if (traits.skinningType)
         writeText(sink, "SkinningType", skinningName(skin.GetSkinningType()));
     if (const auto count = static_cast<std::size_t>(skin.GetControlPointIndicesCount())) {
         writeArray<std::int32_t>(sink, "Indexes", {skin.GetControlPointIndices(), count});
@@ -93,8 +93,8 @@ void writeChannel(FbxBlendShapeChannel& channel, RecordSink& sink) {
 } // namespace
 
 void writeDeformerVersion(const FbxObject& deformer, const VersionTraits& traits, RecordSink& sink) {
-    constexpr int kVersion = 100, kSkinVersion = 101;
-    writeInteger(sink, "Version", deformer.Is<FbxSkin>() && traits.idsAndTemplates ? kSkinVersion : kVersion);
+    constexpr int kVersion = 100;
+    writeInteger(sink, "Version", deformer.Is<FbxSkin>() ? traits.skinVersion : kVersion);
 }
 
 void writeDeformerRecords(FbxObject& deformer, const VersionTraits& traits, RecordSink& sink) {

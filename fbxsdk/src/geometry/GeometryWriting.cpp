@@ -98,7 +98,7 @@ ShapeOffsets offsetsOf(FbxShape& shape) {
 
 void writeShapeRecords(FbxShape& shape, const VersionTraits& traits, RecordSink& sink) {
     const ShapeOffsets shapeOffsets = offsetsOf(shape);
-    if (traits.idsAndTemplates && !traits.inlineShapes)
+    if (traits.shapeVersion)
         writeInteger(sink, "Version", 100);
     writeArray<std::int32_t>(sink, "Indexes", shapeOffsets.indices);
     writeArray<double>(sink, "Vertices", shapeOffsets.offsets);

@@ -70,8 +70,7 @@ void writeVectors(const ElementRecords& records, std::string_view name, std::str
                   std::string_view indexName) {
     DirectArray<FbxVector4> direct = directOf<Class>(records.element);
     writeArray<double>(records.sink, name, packed<FbxVector4>(direct, 0, 3));
-    constexpr int kFirstVersionWithFourth = 102;
-    if (records.traits.normalVersion >= kFirstVersionWithFourth)
+    if (records.traits.fourthNumbers)
         writeArray<double>(records.sink, fourthName, packed<FbxVector4>(direct, 3, 4));
     writeIndices<Class>(records, indexName);
 }
@@ -267,7 +266,7 @@ private:
     void writeElement(const ElementKind& kind, const Element& element, std::int32_t number, RecordSink& sink) const {
         const int version = kind.version == 0 ? mTraits.normalVersion : kind.version;
         const BlockScope block(sink, kind.record, number);
-        writeInteger(sink, "Version", mTraits.idsAndTemplates ? version : kind.legacyVersion);
+        writeInteger(sink, "Version", mTraits.generation == 7 ? version : kind.legacyVersion);
         writeText(sink, "Name", element.GetName());
         writeText(sink, "MappingInformationType", mappingName(element.GetMappingMode()));
         writeText(sink, "ReferenceInformationType", referenceName(element, kind.reference));

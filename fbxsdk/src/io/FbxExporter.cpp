@@ -24,6 +24,7 @@
 #include "io/SceneWriting.h"
 #include "object/ManagerData.h"
 #include "object/SceneMembers.h"
+#include "schema/VersionTraits.h"
 
 FBXSDK_NAMESPACE_BEGIN
 
@@ -88,7 +89,7 @@ std::optional<std::chrono::system_clock::time_point> statedMoment() {
 }
 
 /// Files state local time; a moment that was given is stated as it was given.
-void setCreationTime(WritableDocument& document) {
+void setCreationTime(Document& document) {
     const auto stated = statedMoment();
     const auto moment = stated.value_or(std::chrono::system_clock::now());
     document.createdGmt = utcTime(moment);
@@ -96,7 +97,7 @@ void setCreationTime(WritableDocument& document) {
 }
 
 /// Writes the document into the output. Empty, or why the version cannot hold it.
-std::string writeRecords(WritableDocument& document, const VersionTraits& traits, bool binary, ByteOutput& output) {
+std::string writeRecords(Document& document, const VersionTraits& traits, bool binary, ByteOutput& output) {
     if (!binary) {
         AsciiSink sink(output, traits.version);
         writeDocument(document, traits, sink);
@@ -126,7 +127,8 @@ bool commitWithCaches(FbxScene& scene, OutputFile& file, FbxStatus& status) {
 
 bool writeFile(FbxScene& scene, const std::string& fileName, const VersionTraits& traits, bool binary,
                FbxStatus& status) {
-    WritableDocument document;
+    Document document;
+    document.tree = std::make_unique<RecordTree>();
     document.creator = FbxManager::GetVersion();
     setCreationTime(document);
     writeScene(scene, traits, document);

@@ -46,7 +46,7 @@ std::string_view writtenSubClass(const FbxObject& object, const SchemaClass& sch
 }
 
 struct Writing {
-    WritableObject& target;
+    DocumentObject& target;
     FbxObject& object;
     const VersionTraits& traits;
     RecordTree& texts;
@@ -77,15 +77,15 @@ void writeNode(const Writing& writing) {
     auto& node = writing.as<FbxNode>();
     writing.target.subClass = kindOf(node);
     writing.set("DefaultAttributeIndex", FbxIntDT, "", Value::ofInteger(node.GetNodeAttribute() ? 0 : -1));
-    writing.target.before = versionRecord(kVersion);
+    writing.target.content->before = versionRecord(kVersion);
     const bool hidden = node.GetNodeAttribute() && isView(*node.GetNodeAttribute());
-    writing.target.after = [&node, hidden](RecordSink& sink, const VersionTraits& traits) {
-        if (!traits.idsAndTemplates) {
+    writing.target.content->after = [&node, hidden](RecordSink& sink, const VersionTraits& traits) {
+        if (traits.modelStates) {
             writeInteger(sink, "MultiLayer", 0);
             writeInteger(sink, "MultiTake", 0);
-            if (hidden)
-                writeText(sink, "Hidden", "True");
         }
+        if (hidden && traits.views)
+            writeText(sink, "Hidden", "True");
         writeLetter(sink, "Shading", spellingOf(kShadingModes, node.GetShadingMode(), FbxNode::eHardShading));
         writeText(sink, "Culling", "CullingOff");
     };
@@ -111,11 +111,13 @@ void writeCameraRecords(RecordSink& sink, const FbxCamera& camera) {
 
 void writeCamera(const Writing& writing) {
     auto& camera = writing.as<FbxCamera>();
-    writing.target.after = [&camera](RecordSink& sink, const VersionTraits&) { writeCameraRecords(sink, camera); };
+    writing.target.content->after = [&camera](RecordSink& sink, const VersionTraits&) {
+        writeCameraRecords(sink, camera);
+    };
 }
 
 void writeCameraStereo(const Writing& writing) {
-    writing.target.after = [](RecordSink& sink, const VersionTraits&) {
+    writing.target.content->after = [](RecordSink& sink, const VersionTraits&) {
         writeText(sink, "TypeFlags", "CameraStereo");
         writeInteger(sink, "Version", 100);
     };
@@ -123,7 +125,7 @@ void writeCameraStereo(const Writing& writing) {
 
 void writeCameraSwitcher(const Writing& writing) {
     auto& switcher = writing.as<FbxCameraSwitcher>();
-    writing.target.after = [&switcher](RecordSink& sink, const VersionTraits&) {
+    writing.target.content->after = [&switcher](RecordSink& sink, const VersionTraits&) {
         writeInteger(sink, "Version", 101);
         sink.beginRecord("Name");
         sink.objectName("Model", switcher.GetName());
@@ -135,7 +137,7 @@ void writeCameraSwitcher(const Writing& writing) {
 }
 
 void writeLight(const Writing& writing) {
-    writing.target.after = [](RecordSink& sink, const VersionTraits&) {
+    writing.target.content->after = [](RecordSink& sink, const VersionTraits&) {
         writeText(sink, "TypeFlags", "Light");
         writeInteger(sink, "GeometryVersion", 124);
     };
@@ -143,7 +145,7 @@ void writeLight(const Writing& writing) {
 
 template <const char* const& flags>
 void writeTypeFlags(const Writing& writing) {
-    writing.target.after = [](RecordSink& sink, const VersionTraits&) { writeText(sink, "TypeFlags", flags); };
+    writing.target.content->after = [](RecordSink& sink, const VersionTraits&) { writeText(sink, "TypeFlags", flags); };
 }
 constexpr const char* kNullFlags = "Null";
 constexpr const char* kMarkerFlags = "Marker";
@@ -163,7 +165,7 @@ std::string shadingModelOf(const FbxSurfaceMaterial& material) {
 
 void writeMaterial(const Writing& writing) {
     auto& material = writing.as<FbxSurfaceMaterial>();
-    if (writing.traits.idsAndTemplates) {
+    if (writing.traits.defaultsLeftOut) {
         // What the record says need not be said again. Older files list all properties.
         const std::string model = shadingModelOf(material);
         std::erase_if(writing.target.properties, [&](const DocumentProperty& property) {
@@ -171,7 +173,7 @@ void writeMaterial(const Writing& writing) {
                    property.values.front().toText() == model;
         });
     }
-    writing.target.before = [&material](RecordSink& sink, const VersionTraits&) {
+    writing.target.content->before = [&material](RecordSink& sink, const VersionTraits&) {
         writeInteger(sink, "Version", 102);
         writeText(sink, "ShadingModel", shadingModelOf(material));
         writeInteger(sink, "MultiLayer", material.MultiLayer.Get() ? 1 : 0);
@@ -189,12 +191,12 @@ void writeTextureName(RecordSink& sink, std::string_view record, std::string_vie
 
 void writeFileTexture(const Writing& writing) {
     auto& texture = writing.as<FbxFileTexture>();
-    writing.target.before = [&texture](RecordSink& sink, const VersionTraits&) {
+    writing.target.content->before = [&texture](RecordSink& sink, const VersionTraits&) {
         writeText(sink, "Type", "TextureVideoClip");
         writeInteger(sink, "Version", 202);
         writeTextureName(sink, "TextureName", "Texture", &texture);
     };
-    writing.target.after = [&texture](RecordSink& sink, const VersionTraits&) {
+    writing.target.content->after = [&texture](RecordSink& sink, const VersionTraits&) {
         writeTextureName(sink, "Media", "Video", texture.GetSrcObject<FbxVideo>());
         writeText(sink, "FileName", texture.GetFileName());
         writeText(sink, "RelativeFilename", texture.GetRelativeFileName());
@@ -206,20 +208,22 @@ void writeFileTexture(const Writing& writing) {
 }
 
 void writeLayeredTexture(const Writing& writing) {
-    writing.target.before = [](RecordSink& sink, const VersionTraits&) { writeInteger(sink, "LayeredTexture", 101); };
+    writing.target.content->before = [](RecordSink& sink, const VersionTraits&) {
+        writeInteger(sink, "LayeredTexture", 101);
+    };
 }
 
 void writeVideo(const Writing& writing) {
     auto& video = writing.as<FbxVideo>();
-    writing.target.before = [](RecordSink& sink, const VersionTraits&) { writeText(sink, "Type", "Clip"); };
-    writing.target.after = [&video](RecordSink& sink, const VersionTraits&) {
+    writing.target.content->before = [](RecordSink& sink, const VersionTraits&) { writeText(sink, "Type", "Clip"); };
+    writing.target.content->after = [&video](RecordSink& sink, const VersionTraits&) {
         writeInteger(sink, "UseMipMap", 0);
         writeText(sink, "Filename", video.GetFileName().Buffer());
         writeText(sink, "RelativeFilename", video.GetRelativeFileName().Buffer());
     };
 }
 
-void writeVersion100(const Writing& writing) { writing.target.before = versionRecord(100); }
+void writeVersion100(const Writing& writing) { writing.target.content->before = versionRecord(100); }
 
 void writeStack(const Writing& writing) {
     auto& stack = writing.as<FbxAnimStack>();
@@ -257,8 +261,8 @@ void writeCurveNode(const Writing& writing) {
 void writeCurveKeys(const Writing& writing) {
     auto& curve = writing.as<FbxAnimCurve>();
     writing.target.name = {}; // files give curves no names
-    writing.target.curve = [&curve](const VersionTraits& traits, const UseKeys& use) {
-        if (traits.idsAndTemplates)
+    writing.target.content->curve = [&curve](const VersionTraits& traits, const UseKeys& use) {
+        if (traits.allTangents)
             use(curve.keys());
         else
             use(legacyKeys(curve.keys()));
@@ -267,17 +271,17 @@ void writeCurveKeys(const Writing& writing) {
 
 void writeGeometry(const Writing& writing) {
     auto& geometry = writing.as<FbxGeometryBase>();
-    writing.target.after = [&geometry](RecordSink& sink, const VersionTraits& traits) {
+    writing.target.content->after = [&geometry](RecordSink& sink, const VersionTraits& traits) {
         writeGeometryRecords(geometry, traits, sink);
     };
 }
 
 void writeAnyDeformer(const Writing& writing) {
     FbxObject& deformer = writing.object;
-    writing.target.before = [&deformer](RecordSink& sink, const VersionTraits& traits) {
+    writing.target.content->before = [&deformer](RecordSink& sink, const VersionTraits& traits) {
         writeDeformerVersion(deformer, traits, sink);
     };
-    writing.target.after = [&deformer](RecordSink& sink, const VersionTraits& traits) {
+    writing.target.content->after = [&deformer](RecordSink& sink, const VersionTraits& traits) {
         writeDeformerRecords(deformer, traits, sink);
     };
 }
@@ -338,15 +342,16 @@ bool isView(const FbxNodeAttribute& attribute) {
     return listed;
 }
 
-WritableObject writableObject(FbxObject& object, const SchemaClass& schema, const VersionTraits& traits,
+DocumentObject writableObject(FbxObject& object, const SchemaClass& schema, const VersionTraits& traits,
                               RecordTree& texts) {
-    WritableObject target;
+    DocumentObject target;
+    target.content = std::make_unique<ObjectContent>();
     target.record = schema.record;
-    target.nameClass = schema.nameClass;
+    target.content->nameClass = schema.nameClass;
     target.subClass = writtenSubClass(object, schema);
     target.name = object.data().name;
-    target.templateClass = schema.templateName();
-    const PropertyChoice choice = traits.idsAndTemplates ? PropertyChoice::changed : PropertyChoice::all;
+    target.content->templateClass = schema.templateName();
+    const PropertyChoice choice = traits.defaultsLeftOut ? PropertyChoice::changed : PropertyChoice::all;
     target.properties = writableProperties(object, choice, texts);
     for (const ClassWriter& writer : kWriters) {
         if (object.GetClassId().Is(writer.id)) {

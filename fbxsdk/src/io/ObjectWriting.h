@@ -4,7 +4,7 @@
 // One object of a scene becomes one object of a document: the mirror of ObjectReading.
 #pragma once
 
-#include "document/WritableDocument.h"
+#include "document/Document.h"
 #include "io/SchemaClass.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -17,7 +17,7 @@ namespace detail {
 [[nodiscard]] bool isView(const FbxNodeAttribute& attribute);
 
 /// Everything about the object but its id. What the object holds in large arrays is fetched when it is written.
-[[nodiscard]] WritableObject writableObject(FbxObject& object, const SchemaClass& schema, const VersionTraits& traits,
+[[nodiscard]] DocumentObject writableObject(FbxObject& object, const SchemaClass& schema, const VersionTraits& traits,
                                             RecordTree& texts);
 
 /// The start and end that files state for a span: where it is empty, as it is when nobody set it, those of the keys.

@@ -6,7 +6,7 @@
 
 #include <vector>
 
-#include "document/WritableDocument.h"
+#include "document/Document.h"
 #include "object/ObjectData.h"
 
 FBXSDK_NAMESPACE_BEGIN

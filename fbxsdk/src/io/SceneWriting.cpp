@@ -22,6 +22,7 @@
 #include "object/SceneMembers.h"
 #include "scene/IdleCurveNode.h"
 #include "scene/SceneData.h"
+#include "schema/VersionTraits.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -47,7 +48,7 @@ struct ChosenObject {
 class ObjectChoice {
 public:
     ObjectChoice(FbxScene& scene, const VersionTraits& traits) : mScene(scene) {
-        if (traits.idsAndTemplates)
+        if (!traits.views)
             excludeViews();
     }
 
@@ -175,11 +176,11 @@ private:
     std::vector<std::pair<Rank, DocumentConnection>> mRanked;
 };
 
-void writeSettings(FbxScene& scene, WritableDocument& document) {
-    document.globalSettings = writableProperties(scene.GetGlobalSettings(), PropertyChoice::all, document.texts);
+void writeSettings(FbxScene& scene, Document& document) {
+    document.globalSettings = writableProperties(scene.GetGlobalSettings(), PropertyChoice::all, *document.tree);
     const char* const camera = scene.GlobalCameraSettings().GetDefaultCamera();
     setProperty(document.globalSettings,
-                {"DefaultCamera", "KString", "", "", keepValue(document.texts, Value::ofText(camera))});
+                {"DefaultCamera", "KString", "", "", keepValue(*document.tree, Value::ofText(camera))});
 
     const FbxGlobalLightSettings& lights = scene.GlobalLightSettings();
     DocumentLightSettings& target = document.lightSettings;
@@ -198,16 +199,16 @@ void writeSettings(FbxScene& scene, WritableDocument& document) {
     target.fogEnd = lights.GetFogEnd();
 }
 
-void writeTemplates(const std::vector<ChosenObject>& objects, WritableDocument& document) {
+void writeTemplates(const std::vector<ChosenObject>& objects, Document& document) {
     std::unordered_set<const SchemaClass*> done;
     for (const ChosenObject& chosen : objects) {
         if (done.insert(chosen.schema).second)
             document.templates.push_back({chosen.schema->record, chosen.schema->templateName(),
-                                          templateProperties(chosen.schema->rows, document.texts)});
+                                          templateProperties(chosen.schema->rows, *document.tree)});
     }
 }
 
-void writeTakes(const std::vector<ChosenObject>& objects, WritableDocument& document) {
+void writeTakes(const std::vector<ChosenObject>& objects, Document& document) {
     for (const ChosenObject& chosen : objects) {
         const auto* stack = FbxCast<FbxAnimStack>(chosen.object);
         if (!stack)
@@ -227,7 +228,7 @@ void writeTakes(const std::vector<ChosenObject>& objects, WritableDocument& docu
 
 } // namespace
 
-void writeScene(FbxScene& scene, const VersionTraits& traits, WritableDocument& document) {
+void writeScene(FbxScene& scene, const VersionTraits& traits, Document& document) {
     const std::vector<ChosenObject> objects = ObjectChoice(scene, traits).choose();
     std::unordered_map<const FbxObject*, std::int64_t> ids;
     std::int64_t lastId = 0;
@@ -238,10 +239,10 @@ void writeScene(FbxScene& scene, const VersionTraits& traits, WritableDocument& 
     writeSettings(scene, document);
     writeTemplates(objects, document);
     for (const ChosenObject& chosen : objects) {
-        document.objects.push_back(writableObject(*chosen.object, *chosen.schema, traits, document.texts));
+        document.objects.push_back(writableObject(*chosen.object, *chosen.schema, traits, *document.tree));
         document.objects.back().id = ids.at(chosen.object);
     }
-    ConnectionWriter(scene, ids, document.connections, document.texts).write(objects);
+    ConnectionWriter(scene, ids, document.connections, *document.tree).write(objects);
     writeTakes(objects, document);
 }
 

@@ -13,20 +13,39 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
 struct VersionTraits {
-    const char* name;           ///< as hosts ask for it
-    std::uint32_t version;      ///< as files state it
-    int keyVersion;             ///< of curves
-    int normalVersion;          ///< of layer elements of normals, tangents and binormals; 102 has a fourth number
-    bool inlineShapes;          ///< blend shapes stand inside their geometry, and their weights are its properties
+    const char* name;      ///< as hosts ask for it
+    std::uint32_t version; ///< as files state it
+    int generation;        ///< 6: names tell objects apart, takes hold the animation; 7: objects have ids, curves too
+    // Which objects and properties a file has.
+    bool views;           ///< the application's views: producer cameras, what of them is hidden, their resolution
+    bool defaultsLeftOut; ///< properties that say what the template of their class says
+    bool inlineShapes;    ///< blend shapes stand inside their geometry, and their weights are its properties
+    bool modelStates;     ///< Models say whether they have several layers and takes
+    // Curves.
+    int keyVersion;
+    bool allTangents;           ///< keys can be automatic and clamped, broken or biased
     bool relativeExtrapolation; ///< curves can repeat from where they ended
-    bool idsAndTemplates;       ///< objects have ids, defaults are left out: from 7.0 on
+    // Geometry and deformers.
+    int normalVersion;  ///< of layer elements of normals, tangents and binormals …
+    bool fourthNumbers; ///< … which have a fourth number from 102 on
+    bool shapeVersion;  ///< shapes state one
+    int skinVersion;
+    bool skinningType; ///< skins say how they blend
 };
 
+// clang-format off
 inline constexpr VersionTraits kVersionTraits[] = {
-    {"FBX201000", 6100, 4005, 101, true, false, false}, {"FBX201100", 7100, 4007, 101, true, false, true},
-    {"FBX201200", 7200, 4009, 101, false, true, true},  {"FBX201300", 7300, 4009, 101, false, true, true},
-    {"FBX201400", 7400, 4009, 102, false, true, true},  {"FBX201600", 7500, 4009, 102, false, true, true},
+    //             generation  defaultsLeftOut  modelStates    relativeExtrapolation  shapeVersion    skinningType
+    //                     |  views  |  inlineShapes |  keyVersion  |  normalVersion  |    skinVersion |
+    //                     |    |    |      |        |    | allTangents  |  fourthNumbers  |     |     |
+    {"FBX201000", 6100,    6, true,  false, true,  true,  4005, false, false, 101, false, false, 100, false},
+    {"FBX201100", 7100,    7, false, true,  true,  false, 4007, true,  false, 101, false, false, 101, true},
+    {"FBX201200", 7200,    7, false, true,  false, false, 4009, true,  true,  101, false, true,  101, true},
+    {"FBX201300", 7300,    7, false, true,  false, false, 4009, true,  true,  101, false, true,  101, true},
+    {"FBX201400", 7400,    7, false, true,  false, false, 4009, true,  true,  102, true,  true,  101, true},
+    {"FBX201600", 7500,    7, false, true,  false, false, 4009, true,  true,  102, true,  true,  101, true},
 };
+// clang-format on
 
 /// What is written unless somebody asks for another.
 inline constexpr const VersionTraits& kNewestVersion = kVersionTraits[5];

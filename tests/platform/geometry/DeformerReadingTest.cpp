@@ -164,7 +164,8 @@ TEST_F(DeformerReading, ReadsThePercentageOfAChannel) {
 
 TEST_F(DeformerReading, PrefersThePropertyToTheRecord) {
     const auto source = documentOf("DeformPercent: 37.5");
-    fbxsdk::detail::DocumentObject object = source->objects.front();
+    fbxsdk::detail::DocumentObject object;
+    object.body = source->objects.front().body;
     object.properties.emplace_back().name = "DeformPercent";
     auto* channel = make<FbxBlendShapeChannel>();
     channel->DeformPercent.Set(60.0); // what the reader of properties has done

@@ -23,7 +23,7 @@ struct Layout {
     const char* version;
     int format; ///< 0 binary, 1 ASCII
 
-    [[nodiscard]] bool hasIds() const { return fbxsdk::detail::findVersion(version)->idsAndTemplates; }
+    [[nodiscard]] bool hasIds() const { return fbxsdk::detail::findVersion(version)->generation == 7; }
     [[nodiscard]] bool hasInlineShapes() const { return fbxsdk::detail::findVersion(version)->inlineShapes; }
 };
 

@@ -56,7 +56,7 @@ constexpr Rate kRates[] = {{0, "30"},    {1, "120"},     {2, "100"},   {3, "60"}
 
 class Generation6Writer {
 public:
-    Generation6Writer(const WritableDocument& document, const VersionTraits& traits, RecordSink& sink)
+    Generation6Writer(const Document& document, const VersionTraits& traits, RecordSink& sink)
         : mDocument(document), mTraits(traits), mSink(sink), mLayout(document) {}
 
     void write() {
@@ -82,7 +82,7 @@ private:
 
     void writeDefinitions() {
         std::vector<ObjectCount> kinds;
-        for (const WritableObject& object : mDocument.objects) {
+        for (const DocumentObject& object : mDocument.objects) {
             if (mLayout.standsAlone(object))
                 count(kinds, object.record);
         }
@@ -117,41 +117,41 @@ private:
     void writeObjects() {
         mSink.heading("Object properties");
         const BlockScope block(mSink, "Objects");
-        const std::vector<const WritableObject*> objects = objectsInOrder();
-        const auto behindSceneInfo = std::find_if(objects.begin(), objects.end(), [](const WritableObject* object) {
+        const std::vector<const DocumentObject*> objects = objectsInOrder();
+        const auto behindSceneInfo = std::find_if(objects.begin(), objects.end(), [](const DocumentObject* object) {
             return rankIn(kObjectOrder, object->record) > rankIn(kObjectOrder, "SceneInfo");
         });
-        std::for_each(objects.begin(), behindSceneInfo, [this](const WritableObject* object) { writeObject(*object); });
+        std::for_each(objects.begin(), behindSceneInfo, [this](const DocumentObject* object) { writeObject(*object); });
         writeSceneInfo(mDocument, mTraits, mSink);
-        std::for_each(behindSceneInfo, objects.end(), [this](const WritableObject* object) { writeObject(*object); });
+        std::for_each(behindSceneInfo, objects.end(), [this](const DocumentObject* object) { writeObject(*object); });
         writeGlobalSettings();
     }
 
-    [[nodiscard]] std::vector<const WritableObject*> objectsInOrder() const {
-        std::vector<const WritableObject*> objects;
-        for (const WritableObject& object : mDocument.objects) {
+    [[nodiscard]] std::vector<const DocumentObject*> objectsInOrder() const {
+        std::vector<const DocumentObject*> objects;
+        for (const DocumentObject& object : mDocument.objects) {
             if (mLayout.standsAlone(object))
                 objects.push_back(&object);
         }
-        std::stable_sort(objects.begin(), objects.end(), [](const WritableObject* a, const WritableObject* b) {
+        std::stable_sort(objects.begin(), objects.end(), [](const DocumentObject* a, const DocumentObject* b) {
             return rankIn(kObjectOrder, a->record) < rankIn(kObjectOrder, b->record);
         });
         return objects;
     }
 
-    void writeObject(const WritableObject& object) {
+    void writeObject(const DocumentObject& object) {
         if (mSink.failed())
             return;
-        const WritableObject* attribute = mLayout.attributeOf(object.id);
+        const DocumentObject* attribute = mLayout.attributeOf(object.id);
         writeFullName(object.record, object.id);
         mSink.text(object.subClass);
         mSink.beginBlock();
-        if (object.before)
-            object.before(mSink, mTraits);
+        if (object.content->before)
+            object.content->before(mSink, mTraits);
         writeProperties(object, attribute);
         // An attribute by itself says what it is by its subclass, and has no further records.
-        if (object.after && object.record != "NodeAttribute")
-            object.after(mSink, mTraits);
+        if (object.content->after && object.record != "NodeAttribute")
+            object.content->after(mSink, mTraits);
         if (attribute)
             writeAttribute(*attribute);
         else if (object.record == "NodeAttribute" || object.record == "Geometry")
@@ -159,11 +159,11 @@ private:
         mSink.endRecord();
     }
 
-    void writeAttribute(const WritableObject& attribute) {
-        if (attribute.before)
-            attribute.before(mSink, mTraits);
-        if (attribute.after)
-            attribute.after(mSink, mTraits);
+    void writeAttribute(const DocumentObject& attribute) {
+        if (attribute.content->before)
+            attribute.content->before(mSink, mTraits);
+        if (attribute.content->after)
+            attribute.content->after(mSink, mTraits);
         writeAttributeName(attribute.id);
     }
 
@@ -180,7 +180,7 @@ private:
     }
 
     /// The attribute's properties stand behind the Model's own, with a letter that says so.
-    void writeProperties(const WritableObject& object, const WritableObject* attribute) {
+    void writeProperties(const DocumentObject& object, const DocumentObject* attribute) {
         const BlockScope block(mSink, "Properties60");
         for (const DocumentProperty& property : object.properties)
             writeProperty(property, object.subClass, property.flags);
@@ -189,7 +189,7 @@ private:
     }
 
     /// Those that have other names here stand last.
-    void writeAttributeProperties(const WritableObject& attribute) {
+    void writeAttributeProperties(const DocumentObject& attribute) {
         std::vector<const DocumentProperty*> renamed;
         for (const DocumentProperty& property : attribute.properties) {
             if (legacyPropertyName(attribute.subClass, property.name) != property.name)
@@ -227,7 +227,7 @@ private:
     }
 
     [[nodiscard]] bool isConnectable(std::int64_t id) const {
-        const WritableObject* object = mLayout.find(id);
+        const DocumentObject* object = mLayout.find(id);
         return id == 0 || (object && (mLayout.standsAlone(*object) || !mLayout.holdersOf(id).empty()));
     }
 
@@ -236,7 +236,7 @@ private:
             return;
         const bool betweenObjects = connection.sourceProperty.empty() && connection.destinationProperty.empty();
         // The attribute stands inside.
-        const WritableObject* held = mLayout.attributeOf(connection.destination);
+        const DocumentObject* held = mLayout.attributeOf(connection.destination);
         if (betweenObjects && held && held->id == connection.source)
             return;
         const std::vector<std::int64_t>& holders = mLayout.holdersOf(connection.destination);
@@ -321,7 +321,7 @@ private:
         return property && !property->values.empty() ? property->values.front() : Value();
     }
 
-    const WritableDocument& mDocument;
+    const Document& mDocument;
     const VersionTraits& mTraits;
     RecordSink& mSink;
     LegacyLayout mLayout;
@@ -329,7 +329,7 @@ private:
 
 } // namespace
 
-void writeGeneration6(const WritableDocument& document, const VersionTraits& traits, RecordSink& sink) {
+void writeGeneration6(const Document& document, const VersionTraits& traits, RecordSink& sink) {
     Generation6Writer(document, traits, sink).write();
 }
 

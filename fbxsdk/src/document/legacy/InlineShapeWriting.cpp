@@ -20,7 +20,7 @@ namespace {
 
 constexpr std::string_view kPrefix = "d|";
 
-bool isKind(const WritableObject& object, std::string_view record, std::string_view subClass) {
+bool isKind(const DocumentObject& object, std::string_view record, std::string_view subClass) {
     return object.record == record && object.subClass == subClass;
 }
 
@@ -32,7 +32,7 @@ struct ShapeRecord {
 
 class ShapeMover {
 public:
-    explicit ShapeMover(WritableDocument& document) : mDocument(document) {
+    explicit ShapeMover(Document& document) : mDocument(document) {
         for (std::size_t i = 0; i < document.objects.size(); ++i)
             mIndex.emplace(document.objects[i].id, i);
         for (const DocumentConnection& connection : document.connections) {
@@ -42,7 +42,7 @@ public:
     }
 
     void move() {
-        for (WritableObject& object : mDocument.objects) {
+        for (DocumentObject& object : mDocument.objects) {
             if (object.record == "Geometry" && object.subClass != "Shape")
                 moveInto(object);
         }
@@ -58,46 +58,46 @@ private:
         std::string_view name;
     };
 
-    [[nodiscard]] WritableObject* find(std::int64_t id) {
+    [[nodiscard]] DocumentObject* find(std::int64_t id) {
         const auto found = mIndex.find(id);
         return found == mIndex.end() ? nullptr : &mDocument.objects[found->second];
     }
-    [[nodiscard]] std::vector<WritableObject*> sourcesOf(std::int64_t id, std::string_view record,
+    [[nodiscard]] std::vector<DocumentObject*> sourcesOf(std::int64_t id, std::string_view record,
                                                          std::string_view subClass) {
-        std::vector<WritableObject*> sources;
+        std::vector<DocumentObject*> sources;
         for (const std::int64_t source : mSources[id]) {
-            WritableObject* object = find(source);
+            DocumentObject* object = find(source);
             if (object && isKind(*object, record, subClass))
                 sources.push_back(object);
         }
         return sources;
     }
 
-    void moveInto(WritableObject& geometry) {
+    void moveInto(DocumentObject& geometry) {
         std::vector<ShapeRecord> shapes;
         std::set<std::string, std::less<>> names;
         for (const DocumentProperty& property : geometry.properties)
             names.emplace(property.name);
-        for (const WritableObject* blendShape : sourcesOf(geometry.id, "Deformer", "BlendShape")) {
+        for (const DocumentObject* blendShape : sourcesOf(geometry.id, "Deformer", "BlendShape")) {
             mRemoved.insert(blendShape->id);
-            for (const WritableObject* channel : sourcesOf(blendShape->id, "Deformer", "BlendShapeChannel"))
+            for (const DocumentObject* channel : sourcesOf(blendShape->id, "Deformer", "BlendShapeChannel"))
                 moveChannel(geometry, *channel, names, shapes);
         }
         if (!shapes.empty())
             appendShapes(geometry, std::move(shapes));
     }
 
-    void moveChannel(WritableObject& geometry, const WritableObject& channel, std::set<std::string, std::less<>>& names,
+    void moveChannel(DocumentObject& geometry, const DocumentObject& channel, std::set<std::string, std::less<>>& names,
                      std::vector<ShapeRecord>& shapes) {
         mRemoved.insert(channel.id);
-        const std::vector<WritableObject*> targets = sourcesOf(channel.id, "Geometry", "Shape");
-        for (const WritableObject* target : targets)
+        const std::vector<DocumentObject*> targets = sourcesOf(channel.id, "Geometry", "Shape");
+        for (const DocumentObject* target : targets)
             mRemoved.insert(target->id);
         if (targets.empty())
             return;
         const std::string_view wanted = !targets.back()->name.empty() ? targets.back()->name : channel.name;
-        const std::string_view name = mDocument.texts.keepText(uniqueName(wanted, names));
-        shapes.push_back({name, targets.back()->after});
+        const std::string_view name = mDocument.tree->keepText(uniqueName(wanted, names));
+        shapes.push_back({name, targets.back()->content->after});
         addWeight(geometry, channel, name);
         mWeights.emplace(channel.id, Weight{geometry.id, name});
     }
@@ -110,7 +110,7 @@ private:
         return name;
     }
 
-    void addWeight(WritableObject& geometry, const WritableObject& channel, std::string_view name) {
+    void addWeight(DocumentObject& geometry, const DocumentObject& channel, std::string_view name) {
         const DocumentProperty* percent = findProperty(channel.properties, kDeformPercent);
         DocumentProperty weight{name, "Number", "", "A", {}};
         if (percent) {
@@ -122,9 +122,9 @@ private:
         geometry.properties.push_back(weight);
     }
 
-    static void appendShapes(WritableObject& geometry, std::vector<ShapeRecord> shapes) {
-        geometry.after = [before = std::move(geometry.after), shapes = std::move(shapes)](RecordSink& sink,
-                                                                                          const VersionTraits& traits) {
+    static void appendShapes(DocumentObject& geometry, std::vector<ShapeRecord> shapes) {
+        geometry.content->after = [before = std::move(geometry.content->after),
+                                   shapes = std::move(shapes)](RecordSink& sink, const VersionTraits& traits) {
             before(sink, traits);
             for (const ShapeRecord& shape : shapes) {
                 sink.beginRecord("Shape");
@@ -155,22 +155,22 @@ private:
     }
 
     void renameNode(std::int64_t id, std::string_view name, std::unordered_map<std::int64_t, std::string_view>& nodes) {
-        WritableObject* node = find(id);
+        DocumentObject* node = find(id);
         if (!node || node->record != "AnimationCurveNode" || node->properties.size() != 1)
             return;
         node->name = name;
-        node->properties.front().name = mDocument.texts.keepText(std::string(kPrefix) + std::string(name));
+        node->properties.front().name = mDocument.tree->keepText(std::string(kPrefix) + std::string(name));
         nodes.emplace(id, node->properties.front().name);
     }
 
     void removeMoved() {
-        std::erase_if(mDocument.objects, [&](const WritableObject& object) { return mRemoved.contains(object.id); });
+        std::erase_if(mDocument.objects, [&](const DocumentObject& object) { return mRemoved.contains(object.id); });
         std::erase_if(mDocument.connections, [&](const DocumentConnection& connection) {
             return mRemoved.contains(connection.source) || mRemoved.contains(connection.destination);
         });
     }
 
-    WritableDocument& mDocument;
+    Document& mDocument;
     std::unordered_map<std::int64_t, std::size_t> mIndex;
     std::unordered_map<std::int64_t, std::vector<std::int64_t>> mSources;
     std::unordered_set<std::int64_t> mRemoved;
@@ -179,7 +179,7 @@ private:
 
 } // namespace
 
-void moveShapesInline(WritableDocument& document) { ShapeMover(document).move(); }
+void moveShapesInline(Document& document) { ShapeMover(document).move(); }
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

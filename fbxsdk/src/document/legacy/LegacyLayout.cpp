@@ -17,13 +17,13 @@ namespace {
 constexpr std::string_view kAnimationRecords[] = {"AnimationStack", "AnimationLayer", "AnimationCurveNode",
                                                   "AnimationCurve"};
 
-bool isAnimation(const WritableObject& object) {
+bool isAnimation(const DocumentObject& object) {
     return std::find(std::begin(kAnimationRecords), std::end(kAnimationRecords), object.record) !=
            std::end(kAnimationRecords);
 }
 
 /// Curves and surfaces have records of their own; attributes and meshes stand inside their Models.
-bool standsInModel(const WritableObject& object) {
+bool standsInModel(const DocumentObject& object) {
     return object.record == "NodeAttribute" || (object.record == "Geometry" && object.subClass == "Mesh");
 }
 
@@ -33,22 +33,22 @@ bool betweenObjects(const DocumentConnection& connection) {
 
 } // namespace
 
-LegacyLayout::LegacyLayout(const WritableDocument& document) : mDocument(document), mNames(document.objects) {
-    for (const WritableObject& object : document.objects)
+LegacyLayout::LegacyLayout(const Document& document) : mDocument(document), mNames(document.objects) {
+    for (const DocumentObject& object : document.objects)
         mObjects.emplace(object.id, &object);
     findAttributes();
     findAnimation();
 }
 
-const WritableObject* LegacyLayout::find(std::int64_t id) const {
+const DocumentObject* LegacyLayout::find(std::int64_t id) const {
     const auto found = mObjects.find(id);
     return found == mObjects.end() ? nullptr : found->second;
 }
 
 void LegacyLayout::findAttributes() {
     for (const DocumentConnection& connection : mDocument.connections) {
-        const WritableObject* attribute = find(connection.source);
-        const WritableObject* model = find(connection.destination);
+        const DocumentObject* attribute = find(connection.source);
+        const DocumentObject* model = find(connection.destination);
         const bool holds =
             betweenObjects(connection) && attribute && model && model->record == "Model" && standsInModel(*attribute);
         // Of several attributes the first one stands in the Model.
@@ -57,7 +57,7 @@ void LegacyLayout::findAttributes() {
     }
 }
 
-const WritableObject* LegacyLayout::attributeOf(std::int64_t model) const {
+const DocumentObject* LegacyLayout::attributeOf(std::int64_t model) const {
     const auto found = mAttributes.find(model);
     return found == mAttributes.end() ? nullptr : found->second;
 }
@@ -68,14 +68,14 @@ const std::vector<std::int64_t>& LegacyLayout::holdersOf(std::int64_t attribute)
     return found == mHolders.end() ? kNone : found->second;
 }
 
-bool LegacyLayout::standsAlone(const WritableObject& object) const {
+bool LegacyLayout::standsAlone(const DocumentObject& object) const {
     return !isAnimation(object) && holdersOf(object.id).empty();
 }
 
 void LegacyLayout::findAnimation() {
     for (const DocumentConnection& connection : mDocument.connections) {
-        const WritableObject* source = find(connection.source);
-        const WritableObject* destination = find(connection.destination);
+        const DocumentObject* source = find(connection.source);
+        const DocumentObject* destination = find(connection.destination);
         if (!source)
             continue;
         if (source->record == "AnimationLayer" && destination && destination->record == "AnimationStack")

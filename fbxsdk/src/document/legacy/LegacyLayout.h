@@ -15,26 +15,26 @@ namespace detail {
 /// A curve node of a document, resolved: what it drives, and its curves by component.
 struct DrivenProperty {
     std::string_view property;
-    const WritableObject* node = nullptr;
-    using Curves = std::unordered_map<std::string_view, const WritableObject*>;
+    const DocumentObject* node = nullptr;
+    using Curves = std::unordered_map<std::string_view, const DocumentObject*>;
     Curves curves; ///< by "d|X", …
 };
 
 class LegacyLayout {
 public:
-    explicit LegacyLayout(const WritableDocument& document);
+    explicit LegacyLayout(const Document& document);
 
-    [[nodiscard]] const WritableDocument& document() const { return mDocument; }
+    [[nodiscard]] const Document& document() const { return mDocument; }
     [[nodiscard]] const LegacyName& nameOf(std::int64_t id) const { return mNames[id]; }
     /// Null when there is none of that id.
-    [[nodiscard]] const WritableObject* find(std::int64_t id) const;
+    [[nodiscard]] const DocumentObject* find(std::int64_t id) const;
 
     /// The attribute that stands inside a Model; null when it has none.
-    [[nodiscard]] const WritableObject* attributeOf(std::int64_t model) const;
+    [[nodiscard]] const DocumentObject* attributeOf(std::int64_t model) const;
     /// The Models that an attribute stands in; empty for what has a record of its own.
     [[nodiscard]] const std::vector<std::int64_t>& holdersOf(std::int64_t attribute) const;
     /// Whether the object has a record of its own in the file.
-    [[nodiscard]] bool standsAlone(const WritableObject& object) const;
+    [[nodiscard]] bool standsAlone(const DocumentObject& object) const;
 
     /// The stacks, and what the base layer of each drives: by object, in the order of objects. Takes have no further
     /// layers.
@@ -45,10 +45,10 @@ private:
     void findAttributes();
     void findAnimation();
 
-    const WritableDocument& mDocument;
+    const Document& mDocument;
     LegacyNames mNames;
-    std::unordered_map<std::int64_t, const WritableObject*> mObjects;
-    std::unordered_map<std::int64_t, const WritableObject*> mAttributes;
+    std::unordered_map<std::int64_t, const DocumentObject*> mObjects;
+    std::unordered_map<std::int64_t, const DocumentObject*> mAttributes;
     std::unordered_map<std::int64_t, std::vector<std::int64_t>> mHolders;
     std::unordered_map<std::string_view, std::int64_t> mBaseLayers; ///< by the name of the first stack that has one
     // Of each layer its curve nodes, of each curve node its curves and what it drives.

@@ -20,25 +20,25 @@ std::string keyOf(std::string_view nameClass, std::string_view name) {
 
 } // namespace
 
-LegacyNames::LegacyNames(const std::vector<WritableObject>& objects) {
+LegacyNames::LegacyNames(const std::vector<DocumentObject>& objects) {
     mNames.emplace(0, LegacyName{kRootClass, std::string(kRootName)});
     std::unordered_set<std::string> taken{keyOf(kRootClass, kRootName)};
-    std::vector<const WritableObject*> clashing;
-    for (const WritableObject& object : objects) {
-        if (taken.insert(keyOf(object.nameClass, object.name)).second)
-            mNames.emplace(object.id, LegacyName{object.nameClass, std::string(object.name)});
+    std::vector<const DocumentObject*> clashing;
+    for (const DocumentObject& object : objects) {
+        if (taken.insert(keyOf(object.content->nameClass, object.name)).second)
+            mNames.emplace(object.id, LegacyName{object.content->nameClass, std::string(object.name)});
         else
             clashing.push_back(&object);
     }
     std::unordered_map<std::string, int> numbers; // the last one that was given behind a name
-    for (const WritableObject* object : clashing) {
+    for (const DocumentObject* object : clashing) {
         const std::string base = std::string(object->name) + "_ncl1_";
-        int& number = numbers[keyOf(object->nameClass, base)];
+        int& number = numbers[keyOf(object->content->nameClass, base)];
         std::string name;
         do
             name = base + std::to_string(++number);
-        while (!taken.insert(keyOf(object->nameClass, name)).second);
-        mNames.emplace(object->id, LegacyName{object->nameClass, std::move(name)});
+        while (!taken.insert(keyOf(object->content->nameClass, name)).second);
+        mNames.emplace(object->id, LegacyName{object->content->nameClass, std::move(name)});
     }
 }
 

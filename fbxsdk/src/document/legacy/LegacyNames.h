@@ -8,7 +8,7 @@
 #include <unordered_map>
 #include <unordered_set>
 
-#include "document/WritableDocument.h"
+#include "document/Document.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -23,7 +23,7 @@ struct LegacyName {
 /// number behind it, `cube_ncl1_1`.
 class LegacyNames {
 public:
-    explicit LegacyNames(const std::vector<WritableObject>& objects);
+    explicit LegacyNames(const std::vector<DocumentObject>& objects);
 
     /// The root for the id 0.
     [[nodiscard]] const LegacyName& operator[](std::int64_t id) const { return mNames.at(id); }

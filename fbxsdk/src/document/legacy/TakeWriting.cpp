@@ -74,8 +74,8 @@ private:
     }
 
     /// A Model's channels are its own and those of the attribute in it.
-    void writeModel(const WritableObject& model, const LegacyLayout::Driven& driven) {
-        const WritableObject* attribute = mLayout.attributeOf(model.id);
+    void writeModel(const DocumentObject& model, const LegacyLayout::Driven& driven) {
+        const DocumentObject* attribute = mLayout.attributeOf(model.id);
         const std::vector<DrivenProperty>* own = propertiesOf(driven, model.id);
         const std::vector<DrivenProperty>* inner = attribute ? propertiesOf(driven, attribute->id) : nullptr;
         if (!own && !inner)
@@ -91,7 +91,7 @@ private:
     }
 
     void writeOther(std::int64_t id, const std::vector<DrivenProperty>& properties) {
-        const WritableObject& object = *mLayout.find(id);
+        const DocumentObject& object = *mLayout.find(id);
         if (object.record == "Model" || !mLayout.standsAlone(object))
             return;
         beginObject(object.record, id);
@@ -108,7 +108,7 @@ private:
     }
 
     /// All three parts of the transform, whichever of them move.
-    void writeTransform(const WritableObject& model, const std::vector<DrivenProperty>& properties) {
+    void writeTransform(const DocumentObject& model, const std::vector<DrivenProperty>& properties) {
         const bool moves = std::any_of(properties.begin(), properties.end(),
                                        [](const DrivenProperty& driven) { return isTransform(driven.property); });
         if (!moves)
@@ -158,7 +158,7 @@ private:
         const double value = component.values.empty() ? 0.0 : component.values.front().toReal();
         const auto write = [&](const CurveKeys& keys) { writeLegacyCurve(mSink, mTraits, keys, value); };
         if (found != driven.curves.end())
-            found->second->curve(mTraits, write);
+            found->second->content->curve(mTraits, write);
         else
             write({});
         writeColor();
