@@ -10,6 +10,7 @@
 #include "calls/LastError.h"
 #include "faithful/Reading.h"
 #include "faithful/Writing.h"
+#include "sdk/NodeMasks.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -19,6 +20,7 @@ namespace Tarnell::Fbx {
 using detail::CallScope;
 using detail::fail;
 using detail::succeed;
+namespace NodeMask = detail::NodeMask;
 
 namespace {
 
@@ -33,17 +35,20 @@ struct ReaderRow {
 template <class Object>
 constexpr ReaderRow<Object> kReader{};
 template <>
-constexpr ReaderRow<TnFbxMesh> kReader<TnFbxMesh> = {&FbxSdk::getNumberOfMeshes, 0x4, &FbxSdk::getMeshes};
+constexpr ReaderRow<TnFbxMesh> kReader<TnFbxMesh> = {&FbxSdk::getNumberOfMeshes, NodeMask::kMeshes, &FbxSdk::getMeshes};
 template <>
-constexpr ReaderRow<TnFbxCamera> kReader<TnFbxCamera> = {&FbxSdk::getNumberOfCameras, 0x20, &FbxSdk::getCameras};
+constexpr ReaderRow<TnFbxCamera> kReader<TnFbxCamera> = {&FbxSdk::getNumberOfCameras, NodeMask::kCameras,
+                                                         &FbxSdk::getCameras};
 template <>
-constexpr ReaderRow<TnFbxLight> kReader<TnFbxLight> = {&FbxSdk::getNumberOfLights, 0x40, &FbxSdk::getLights};
+constexpr ReaderRow<TnFbxLight> kReader<TnFbxLight> = {&FbxSdk::getNumberOfLights, NodeMask::kLights,
+                                                       &FbxSdk::getLights};
 template <>
-constexpr ReaderRow<TnFbxMarker> kReader<TnFbxMarker> = {&FbxSdk::getNumberOfMarkers, 0x1, &FbxSdk::getMarkers};
+constexpr ReaderRow<TnFbxMarker> kReader<TnFbxMarker> = {&FbxSdk::getNumberOfMarkers, NodeMask::kMarkers,
+                                                         &FbxSdk::getMarkers};
 template <>
-constexpr ReaderRow<TnFbxNull> kReader<TnFbxNull> = {&FbxSdk::getNumberOfNulls, 0x4000, &FbxSdk::getNulls};
+constexpr ReaderRow<TnFbxNull> kReader<TnFbxNull> = {&FbxSdk::getNumberOfNulls, NodeMask::kNulls, &FbxSdk::getNulls};
 template <>
-constexpr ReaderRow<TnFbxTransform> kReader<TnFbxTransform> = {&FbxSdk::getNumberOfTransforms, 0x4005,
+constexpr ReaderRow<TnFbxTransform> kReader<TnFbxTransform> = {&FbxSdk::getNumberOfTransforms, NodeMask::kTransforms,
                                                                &FbxSdk::getTransforms};
 
 template <class Object>

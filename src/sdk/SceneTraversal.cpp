@@ -8,6 +8,7 @@
 
 #include "GlobalSampler.h"
 #include "NodeGeometry.h"
+#include "NodeMasks.h"
 #include "PointCacheScope.h"
 #include "ReadScope.h"
 #include "access/FileWarnings.h"
@@ -25,6 +26,7 @@ namespace Tarnell::Fbx {
 
 using detail::fail;
 using detail::succeed;
+namespace NodeMask = detail::NodeMask;
 
 namespace {
 
@@ -48,28 +50,22 @@ struct MaskRow {
     std::uint32_t types;
 };
 constexpr MaskRow kMaskRows[] = {
-    {0x1, bitOf(Attribute::eMarker)},
-    {0x2, bitOf(Attribute::eSkeleton)},
-    {0x4, bitOf(Attribute::eMesh)},
-    {0x8, bitOf(Attribute::eNurbs)},
-    {0x10, bitOf(Attribute::ePatch)},
-    {0x20, bitOf(Attribute::eCamera)},
-    {0x40, bitOf(Attribute::eLight)},
-    {0x80, bitOf(Attribute::eOpticalReference)},
-    {0x100, bitOf(Attribute::eOpticalMarker)},
-    {0x200, bitOf(Attribute::eCameraSwitcher)},
-    {0x800, bitOf(Attribute::eNurbsCurve)},
-    {0x1000, bitOf(Attribute::eTrimNurbsSurface)},
-    {0x2000, bitOf(Attribute::eBoundary)},
-    {0x4000, kNoAttribute | bitOf(Attribute::eNull) | bitOf(Attribute::eNurbsSurface)}, // kept: surfaces with nulls
+    {NodeMask::kMarkers, bitOf(Attribute::eMarker)},
+    {NodeMask::kSkeletons, bitOf(Attribute::eSkeleton)},
+    {NodeMask::kMeshes, bitOf(Attribute::eMesh)},
+    {NodeMask::kNurbs, bitOf(Attribute::eNurbs)},
+    {NodeMask::kPatches, bitOf(Attribute::ePatch)},
+    {NodeMask::kCameras, bitOf(Attribute::eCamera)},
+    {NodeMask::kLights, bitOf(Attribute::eLight)},
+    {NodeMask::kOpticalReferences, bitOf(Attribute::eOpticalReference)},
+    {NodeMask::kOpticalMarkers, bitOf(Attribute::eOpticalMarker)},
+    {NodeMask::kCameraSwitchers, bitOf(Attribute::eCameraSwitcher)},
+    {NodeMask::kNurbsCurves, bitOf(Attribute::eNurbsCurve)},
+    {NodeMask::kTrimmedSurfaces, bitOf(Attribute::eTrimNurbsSurface)},
+    {NodeMask::kBoundaries, bitOf(Attribute::eBoundary)},
+    {NodeMask::kNulls,
+     kNoAttribute | bitOf(Attribute::eNull) | bitOf(Attribute::eNurbsSurface)}, // kept: surfaces with nulls
 };
-
-constexpr int kMeshMask = 0x4;
-constexpr int kCameraMask = 0x20;
-constexpr int kLightMask = 0x40;
-constexpr int kMarkerMask = 0x1;
-constexpr int kNullMask = 0x4000;
-constexpr int kTransformMask = kNullMask | kMeshMask | kMarkerMask;
 
 std::uint32_t selectedTypes(long mask) {
     std::uint32_t types = 0;
@@ -322,11 +318,11 @@ bool FbxSdk::getNumberOfNodeTypesRecursive(fbxsdk::FbxNode* node, int mask, int&
     });
 }
 
-int FbxSdk::getNumberOfMeshes() const { return getNumberOfNodeTypes(kMeshMask); }
-int FbxSdk::getNumberOfLights() const { return getNumberOfNodeTypes(kLightMask); }
-int FbxSdk::getNumberOfMarkers() const { return getNumberOfNodeTypes(kMarkerMask); }
-int FbxSdk::getNumberOfNulls() const { return getNumberOfNodeTypes(kNullMask); }
-int FbxSdk::getNumberOfTransforms() const { return getNumberOfNodeTypes(kTransformMask); }
+int FbxSdk::getNumberOfMeshes() const { return getNumberOfNodeTypes(NodeMask::kMeshes); }
+int FbxSdk::getNumberOfLights() const { return getNumberOfNodeTypes(NodeMask::kLights); }
+int FbxSdk::getNumberOfMarkers() const { return getNumberOfNodeTypes(NodeMask::kMarkers); }
+int FbxSdk::getNumberOfNulls() const { return getNumberOfNodeTypes(NodeMask::kNulls); }
+int FbxSdk::getNumberOfTransforms() const { return getNumberOfNodeTypes(NodeMask::kTransforms); }
 
 int FbxSdk::getNumberOfCameras() const {
     if (!mInitialized || mScene == nullptr) {
@@ -336,7 +332,7 @@ int FbxSdk::getNumberOfCameras() const {
     const auto producerCount =
         std::count_if(std::begin(kProducers), std::end(kProducers),
                       [&settings](const ProducerRow& row) { return (settings.*row.camera)() != nullptr; });
-    return static_cast<int>(producerCount) + getNumberOfNodeTypes(kCameraMask);
+    return static_cast<int>(producerCount) + getNumberOfNodeTypes(NodeMask::kCameras);
 }
 
 // ---- Naming ----
@@ -346,7 +342,7 @@ bool FbxSdk::getNodeNames(long mask, std::vector<std::string>& names) {
     if (mScene == nullptr) {
         return fail("no scene is loaded");
     }
-    if ((mask & kCameraMask) != 0) {
+    if ((mask & NodeMask::kCameras) != 0) {
         const fbxsdk::FbxGlobalCameraSettings& settings = ensureProducers(*mScene);
         for (const ProducerRow& row : kProducers) {
             if ((settings.*row.camera)() != nullptr) {
