@@ -19,6 +19,7 @@
 #include <vector>
 
 #include "container/AsciiPreamble.h"
+#include "container/FileFormat.h"
 #include "container/NumberRun.h"
 #include "container/NumberText.h"
 #include "container/ReadLimits.h"
@@ -28,19 +29,9 @@ namespace detail {
 
 namespace {
 
-/// From this version on, whole numbers in KeyAttrDataFloat are the bits of floats.
-constexpr std::uint32_t kFirstBitPatternVersion = 7200;
-
 /// More than there can be: stands for a count beyond all whole numbers.
 constexpr std::int64_t kMostNumbers = std::numeric_limits<std::int64_t>::max();
 
-struct Entity {
-    std::string_view spelling;
-    char character;
-};
-constexpr Entity kEntities[] = {{"&quot;", '"'}, {"&lf;", '\n'}, {"&cr;", '\r'}};
-
-/// Nothing else is an entity: "&amp;" and a lone "&" stand for themselves.
 std::string decodeEntities(std::string_view text) {
     std::string decoded;
     decoded.reserve(text.size());
@@ -395,7 +386,7 @@ bool AsciiReader::readArray(const Record& record, Value& value) {
                                " numbers, but says " + std::to_string(stated));
     }
     StoredArray& array = keepArray(start, run);
-    array.bitPatterns = mArrayVersion >= kFirstBitPatternVersion && record.name == "KeyAttrDataFloat";
+    array.bitPatterns = mArrayVersion >= kFirstVersionWithBitPatterns && record.name == "KeyAttrDataFloat";
     value = Value::ofArray(array);
     return true;
 }

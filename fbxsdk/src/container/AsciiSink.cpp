@@ -11,6 +11,8 @@
 #include <cmath>
 #include <type_traits>
 
+#include "container/FileFormat.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
@@ -22,14 +24,6 @@ constexpr std::size_t kArrayLine = 2000;
 /// … and lists of single values, in the older layout, before the first one beyond this.
 constexpr std::size_t kListLine = 115;
 constexpr std::string_view kListContinuation = "\n             ";
-
-/// From this version on the packed data of keys is spelt as whole numbers, before as floats.
-constexpr std::uint32_t kFirstVersionWithBitPatterns = 7200;
-
-constexpr struct {
-    char character;
-    std::string_view entity;
-} kEntities[] = {{'"', "&quot;"}, {'\n', "&lf;"}, {'\r', "&cr;"}};
 
 void appendBase64(std::string& text, std::span<const char> bytes) {
     constexpr std::string_view kDigits = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
@@ -152,7 +146,7 @@ void AsciiSink::appendEscaped(std::string_view text) {
         const auto* const row = std::find_if(std::begin(kEntities), std::end(kEntities),
                                              [c](const auto& each) { return each.character == c; });
         if (row != std::end(kEntities)) {
-            mText += row->entity;
+            mText += row->spelling;
         } else {
             mText += c;
         }
@@ -178,7 +172,7 @@ void AsciiSink::objectName(std::string_view className, std::string_view name) {
     separate(/*beforeText*/ true);
     mText += '"';
     mText += className;
-    mText += "::";
+    mText += kAsciiNameSeparator;
     appendEscaped(name);
     mText += '"';
 }

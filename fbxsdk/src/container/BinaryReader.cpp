@@ -17,6 +17,7 @@
 
 #include "container/ByteOrder.h"
 #include "container/FileBytes.h"
+#include "container/FileFormat.h"
 #include "container/NumberDecoding.h"
 #include "container/ReadLimits.h"
 #include "container/ZlibStream.h"
@@ -26,11 +27,9 @@ namespace detail {
 
 namespace {
 
-constexpr std::string_view kMagic = "Kaydara FBX Binary  ";
-constexpr std::size_t kByteOrderOffset = 22;
-constexpr std::size_t kVersionOffset = 23;
+constexpr std::size_t kByteOrderOffset = kBinaryHead.size() - 1;
+constexpr std::size_t kVersionOffset = kBinaryHead.size();
 constexpr std::size_t kHeaderSize = 27;
-constexpr std::uint32_t kFirstWideVersion = 7500;
 
 /// Deflate's ratio holds for long streams; a short one may have a few bytes more for its head.
 constexpr std::uint64_t kDeflateSlack = 1024;
@@ -436,7 +435,9 @@ bool BinaryReader::checkArray(const StoredArray& array, std::size_t offset) {
 
 } // namespace
 
-bool isBinary(std::span<const char> bytes) { return std::string_view(bytes.data(), bytes.size()).starts_with(kMagic); }
+bool isBinary(std::span<const char> bytes) {
+    return std::string_view(bytes.data(), bytes.size()).starts_with(kBinaryMagic);
+}
 
 std::uint64_t binaryRecordEnd(std::span<const char> bytes, const RecordTree& tree, const Record& record) {
     const bool swap = needsSwap(tree.bigEndian), wide = tree.version >= kFirstWideVersion;

@@ -13,21 +13,19 @@
 #include <fbxsdk/extensions/Threads.h>
 
 #include "container/ByteOrder.h"
+#include "container/FileFormat.h"
 #include "core/Parallel.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-constexpr std::string_view kMagic("Kaydara FBX Binary  \0\x1A\0", 23);
-constexpr std::uint32_t kFirstWideVersion = 7500;
 /// Raw bytes from which on an array is compressed. The applications draw the line here too.
 constexpr std::size_t kShortestCompressed = 1024;
 constexpr std::size_t kFooterAlignment = 16;
 constexpr std::size_t kFooterZeros = 120;
 constexpr FileCode kFooterMagic{0xF8, 0x5A, 0x8C, 0x6A, 0xDE, 0xF5, 0xD9, 0x7E,
                                 0xEC, 0xE9, 0x0C, 0xE3, 0x75, 0x8F, 0x29, 0x0B};
-constexpr std::string_view kNameSeparator("\0\1", 2);
 /// Sizes of texts and arrays are 32 bits wide in every version.
 constexpr std::uint64_t kMaxValueBytes = std::numeric_limits<std::uint32_t>::max();
 
@@ -67,7 +65,7 @@ BinarySink::BinarySink(ByteOutput& output, std::uint32_t version, std::uint64_t 
       mMaxSize(mWide ? std::numeric_limits<std::uint64_t>::max() : maxNarrowSize) {
     char versionBytes[4];
     storeNumber(versionBytes, version);
-    mOutput.write(bytesOf(kMagic));
+    mOutput.write(bytesOf(kBinaryHead));
     mOutput.write(versionBytes);
 }
 
@@ -224,7 +222,7 @@ void BinarySink::text(std::string_view value) { sizedBytes('S', value); }
 void BinarySink::raw(std::span<const char> bytes) { sizedBytes('R', {bytes.data(), bytes.size()}); }
 
 void BinarySink::objectName(std::string_view className, std::string_view name) {
-    sizedBytes('S', name, kNameSeparator, className);
+    sizedBytes('S', name, kBinaryNameSeparator, className);
 }
 
 template <class Number>

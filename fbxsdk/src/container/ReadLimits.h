@@ -5,19 +5,11 @@
 #pragma once
 
 #include <cstddef>
-#include <cstdint>
 
 #include <fbxsdk/FbxArch.h>
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
-
-inline constexpr std::uint32_t kOldestVersion = 3000;
-inline constexpr std::uint32_t kFirstUnknownVersion = 8000;
-
-[[nodiscard]] constexpr bool isSupportedVersion(std::uint32_t version) {
-    return version >= kOldestVersion && version < kFirstUnknownVersion;
-}
 
 /// Levels of records. Sound files need less than twelve; one with fifty nested channels is known.
 inline constexpr std::size_t kMaxDepth = 64;

@@ -15,9 +15,6 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// From this version on, number lists are arrays; before, they are a scalar per element.
-inline constexpr std::uint32_t kFirstVersionWithArrays = 7000;
-
 /// A record is begun, gets its values, then perhaps a block of further records, and is ended:
 ///
 ///     sink.beginRecord("Layer"); sink.integer(0); sink.beginBlock(); …records…; sink.endRecord();

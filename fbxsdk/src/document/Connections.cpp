@@ -9,6 +9,7 @@
 #include <tuple>
 
 #include "document/DocumentBuilder.h"
+#include "schema/ProducerCameras.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -27,15 +28,11 @@ constexpr ConnectionLayout kConnectionLayouts[] = {
 };
 
 /// Models of these names stay out of the node tree when nothing connects them to it: they are the application's views.
-constexpr std::pair<std::string_view, std::string_view> kViewModels[] = {
-    {"Camera", "Producer Perspective"}, {"Camera", "Producer Front"},          {"Camera", "Producer Back"},
-    {"Camera", "Producer Right"},       {"Camera", "Producer Left"},           {"Camera", "Producer Top"},
-    {"Camera", "Producer Bottom"},      {"CameraSwitcher", "Camera Switcher"},
-};
-
 bool isViewModel(const DocumentObject& object) {
-    return std::any_of(std::begin(kViewModels), std::end(kViewModels),
-                       [&](const auto& view) { return object.subClass == view.first && object.name == view.second; });
+    if (object.subClass == "CameraSwitcher")
+        return object.name == kCameraSwitcherName;
+    return object.subClass == "Camera" && std::find(kProducerCameraNames.begin(), kProducerCameraNames.end(),
+                                                    object.name) != kProducerCameraNames.end();
 }
 
 bool endsExist(const Document& document, const DocumentConnection& connection) {

@@ -7,6 +7,7 @@
 #include <algorithm>
 #include <limits>
 
+#include "container/FileFormat.h"
 #include "document/FileTicks.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -161,12 +162,11 @@ std::string quotedName(std::string_view name) {
 }
 
 std::string_view nameWithoutClass(std::string_view fullName, bool ascii) {
-    constexpr std::string_view kBinarySeparator("\0\1", 2);
-    if (const auto separator = fullName.find(kBinarySeparator); separator != std::string_view::npos)
+    if (const auto separator = fullName.find(kBinaryNameSeparator); separator != std::string_view::npos)
         return fullName.substr(0, separator);
     if (!ascii)
         return fullName;
-    const auto separator = fullName.find("::");
+    const auto separator = fullName.find(kAsciiNameSeparator);
     return separator == std::string_view::npos ? fullName : fullName.substr(separator + 2);
 }
 

@@ -18,13 +18,13 @@ namespace detail {
 /// The present name of a property of a node attribute ("Light", "Camera" or the class names "FbxLight", "FbxCamera").
 [[nodiscard]] std::string_view modernPropertyName(std::string_view subClass, std::string_view name);
 
+/// How files before 7.0 call a property of a kind of attribute.
+[[nodiscard]] std::string_view legacyPropertyName(std::string_view subClass, std::string_view name);
+
 /// Gives old properties of lights and cameras their present names, unless the list has a property of that name.
 /// `record` is the object's record name; only node attributes have such properties.
 void modernizePropertyNames(std::string_view record, std::string_view subClass,
                             std::vector<DocumentProperty>& properties);
-
-/// The second type string of a property, which files before 7.x do not have: "double" gives "Number".
-[[nodiscard]] std::string_view subTypeOf(std::string_view typeName);
 
 /// The flags of a node attribute's property without the letter N, which says whose property it is.
 [[nodiscard]] std::string_view attributeFlags(RecordTree& tree, std::string_view flags);

@@ -4,6 +4,7 @@
 // Which generation a file is of, and what all of them have in common.
 #include <limits>
 
+#include "container/FileFormat.h"
 #include "document/DocumentBuilder.h"
 #include "document/FileTicks.h"
 #include "document/ValueCounts.h"
@@ -12,12 +13,10 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-constexpr std::uint32_t kFirstVersion = 3000;
-constexpr std::uint32_t kLastVersion = 7999;
 constexpr std::uint32_t kFirstVersionOfGeneration6 = 6000;
 constexpr std::uint32_t kFirstVersionOfGeneration7 = 7000;
 /// What binary files before 6.0 state, whatever their document's version.
-constexpr std::uint32_t kOldContainerVersion = 3000;
+constexpr std::uint32_t kOldContainerVersion = kOldestVersion;
 
 std::uint32_t statedVersion(const Record& root) {
     const Record* header = root.child("FBXHeaderExtension");
@@ -124,9 +123,9 @@ bool readByGeneration(DocumentBuilder& builder, FbxStatus& status) {
 
 std::unique_ptr<Document> readDocument(std::unique_ptr<RecordTree> tree, FbxStatus& status) {
     const std::uint32_t version = versionOf(*tree);
-    if (version < kFirstVersion || version > kLastVersion) {
+    if (!isSupportedVersion(version)) {
         status.SetCode(FbxStatus::eInvalidFileVersion, "%s: file version %u is not supported; %u to %u are.",
-                       tree->fileName.c_str(), version, kFirstVersion, kLastVersion);
+                       tree->fileName.c_str(), version, kOldestVersion, kFirstUnknownVersion - 1);
         return nullptr;
     }
     if (!checkSections(*tree, status) || !checkValueCounts(*tree, status))

@@ -8,7 +8,6 @@
 #include <algorithm>
 #include <array>
 #include <optional>
-#include <string_view>
 #include <vector>
 
 #include <fbxsdk/FbxBlendShapeChannel.h>
@@ -16,36 +15,11 @@
 #include <fbxsdk/FbxSkin.h>
 
 #include "geometry/ItemReading.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
-
-template <class Enum>
-struct Spelling {
-    std::string_view text;
-    Enum value;
-};
-
-constexpr Spelling<FbxSkin::EType> kSkinningTypes[] = {
-    {"Rigid", FbxSkin::eRigid},
-    {"Linear", FbxSkin::eLinear},
-    {"DualQuaternion", FbxSkin::eDualQuaternion},
-    {"Blend", FbxSkin::eBlend},
-};
-
-constexpr Spelling<FbxCluster::ELinkMode> kLinkModes[] = {
-    {"Normalize", FbxCluster::eNormalize},
-    {"Additive", FbxCluster::eAdditive},
-    {"Total1", FbxCluster::eTotalOne},
-};
-
-template <class Enum, std::size_t N>
-std::optional<Enum> findSpelling(const Spelling<Enum> (&spellings)[N], std::string_view text) {
-    const auto* found = std::find_if(std::begin(spellings), std::end(spellings),
-                                     [text](const Spelling<Enum>& spelling) { return spelling.text == text; });
-    return found == std::end(spellings) ? std::nullopt : std::optional(found->value);
-}
 
 /// Sixteen numbers, the translation in the last four. What the last column says is not believed: the matrix is affine.
 std::optional<FbxAMatrix> readMatrix(const Record& body, std::string_view name) {
@@ -62,8 +36,8 @@ std::optional<FbxAMatrix> readMatrix(const Record& body, std::string_view name) 
 }
 
 void readSkin(FbxSkin& skin, const Record& body) {
-    if (const auto type = findSpelling(kSkinningTypes, body.childValue("SkinningType").toText()))
-        skin.SetSkinningType(*type);
+    const int type = numberOf(kSkinningTypes, body.childValue("SkinningType").toText(), skin.GetSkinningType());
+    skin.SetSkinningType(static_cast<FbxSkin::EType>(type));
     skin.SetDeformAccuracy(body.childValue("Link_DeformAcuracy").toReal(skin.GetDeformAccuracy()));
     const Record* indexRecord = body.child("Indexes");
     const Record* weightRecord = body.child("BlendWeights");
@@ -78,8 +52,8 @@ void readSkin(FbxSkin& skin, const Record& body) {
 }
 
 void readCluster(FbxCluster& cluster, const Record& body) {
-    if (const auto mode = findSpelling(kLinkModes, body.childValue("Mode").toText()))
-        cluster.SetLinkMode(*mode);
+    const int mode = numberOf(kLinkModes, body.childValue("Mode").toText(), cluster.GetLinkMode());
+    cluster.SetLinkMode(static_cast<FbxCluster::ELinkMode>(mode));
     const std::optional<FbxAMatrix> link = readMatrix(body, "TransformLink");
     const std::optional<FbxAMatrix> geometry = readMatrix(body, "Transform");
     const std::optional<FbxAMatrix> associate = readMatrix(body, "TransformAssociateModel");

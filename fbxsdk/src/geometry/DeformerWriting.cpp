@@ -13,29 +13,16 @@
 
 #include "document/RecordWriting.h"
 #include "geometry/GeometryWriting.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-std::string_view skinningName(FbxSkin::EType type) {
-    switch (type) {
-    case FbxSkin::eRigid:
-        return "Rigid";
-    case FbxSkin::eLinear:
-        return "Linear";
-    case FbxSkin::eDualQuaternion:
-        return "DualQuaternion";
-    case FbxSkin::eBlend:
-        return "Blend";
-    }
-    return "Linear";
-}
-
 void writeSkin(const FbxSkin& skin, const VersionTraits& traits, RecordSink& sink) {
     writeReal(sink, "Link_DeformAcuracy", skin.GetDeformAccuracy());
     if (traits.skinningType)
-        writeText(sink, "SkinningType", skinningName(skin.GetSkinningType()));
+        writeText(sink, "SkinningType", spellingOf(kSkinningTypes, skin.GetSkinningType(), FbxSkin::eLinear));
     if (const auto count = static_cast<std::size_t>(skin.GetControlPointIndicesCount())) {
         writeArray<std::int32_t>(sink, "Indexes", {skin.GetControlPointIndices(), count});
         writeArray<double>(sink, "BlendWeights", {skin.GetControlPointBlendWeights(), count});
@@ -51,14 +38,8 @@ void writeMatrix(RecordSink& sink, std::string_view name, const FbxAMatrix& matr
 
 /// Normalising is what an absent record means.
 void writeLinkMode(RecordSink& sink, FbxCluster::ELinkMode mode) {
-    switch (mode) {
-    case FbxCluster::eNormalize:
-        return;
-    case FbxCluster::eAdditive:
-        return writeText(sink, "Mode", "Additive");
-    case FbxCluster::eTotalOne:
-        return writeText(sink, "Mode", "Total1");
-    }
+    if (mode != FbxCluster::eNormalize)
+        writeText(sink, "Mode", spellingOf(kLinkModes, mode, FbxCluster::eNormalize));
 }
 
 void writePoints(RecordSink& sink, const FbxCluster& cluster) {

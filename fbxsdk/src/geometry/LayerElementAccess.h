@@ -7,9 +7,20 @@
 #include <fbxsdk/FbxLayer.h>
 
 #include "geometry/GeometrySource.h"
+#include "schema/LayerElements.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
+
+static_assert(int{LayerElementType::normal} == FbxLayerElement::eNormal &&
+              int{LayerElementType::coordinates} == FbxLayerElement::eUV &&
+              int{LayerElementType::hole} == FbxLayerElement::eHole &&
+              int{LayerElementType::visibility} == FbxLayerElement::eVisibility &&
+              int{LayerElementType::textureDiffuse} == FbxLayerElement::eTextureDiffuse);
+static_assert(FbxLayerElement::eTextureDiffuse + std::size(kLayerChannels) ==
+              FbxLayerElement::eTextureDisplacement + 1U);
+static_assert(kMappingModes.size() == FbxLayerElement::eAllSame + 1U &&
+              kReferenceModes.size() == FbxLayerElement::eIndexToDirect + 1U);
 
 struct LayerElementAccess {
     /// The element's arrays are decoded when somebody asks for one of them.

@@ -19,8 +19,9 @@
 #include <string_view>
 #include <utility>
 
-#include "geometry/LayerChannels.h"
 #include "geometry/LayerElementAccess.h"
+#include "schema/LayerElements.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -28,87 +29,69 @@ namespace {
 
 using Element = FbxLayerElement;
 using Access = LayerElementAccess;
+using Storage = LayerElementStorage;
 
-/// How an element stores its values.
-enum class Storage {
-    values,  ///< values, and perhaps indices to them
-    numbers, ///< indices into something else: the materials or textures of a node
-    groups,  ///< indices that are the values
-};
-
-struct ElementKind {
-    std::string_view record;
-    int slot;
-    Element* (*create)(FbxLayerContainer& container, const char* name);
-    Storage storage;
-    std::string_view direct, index; ///< records with the arrays
-    std::string_view fourth = {};   ///< … and with the fourth numbers of vectors
-};
+using CreateElement = Element* (*)(FbxLayerContainer& container, const char* name);
 
 template <class Class>
 Element* create(FbxLayerContainer& container, const char* name) {
     return Class::Create(&container, name);
 }
 
-const ElementKind kKinds[] = {
-    {"LayerElementNormal", Element::eNormal, create<FbxLayerElementNormal>, Storage::values, "Normals", "NormalsIndex",
-     "NormalsW"},
-    {"LayerElementBinormal", Element::eBiNormal, create<FbxLayerElementBinormal>, Storage::values, "Binormals",
-     "BinormalsIndex", "BinormalsW"},
-    {"LayerElementTangent", Element::eTangent, create<FbxLayerElementTangent>, Storage::values, "Tangents",
-     "TangentsIndex", "TangentsW"},
-    {"LayerElementColor", Element::eVertexColor, create<FbxLayerElementVertexColor>, Storage::values, "Colors",
-     "ColorIndex"},
-    {"LayerElementMaterial", Element::eMaterial, create<FbxLayerElementMaterial>, Storage::numbers, "", "Materials"},
-    {"LayerElementSmoothing", Element::eSmoothing, create<FbxLayerElementSmoothing>, Storage::values, "Smoothing", ""},
-    {"LayerElementEdgeCrease", Element::eEdgeCrease, create<FbxLayerElementCrease>, Storage::values, "EdgeCrease", ""},
-    {"LayerElementVertexCrease", Element::eVertexCrease, create<FbxLayerElementCrease>, Storage::values, "VertexCrease",
-     ""},
-    {"LayerElementHole", Element::eHole, create<FbxLayerElementHole>, Storage::values, "Hole", ""},
-    {"LayerElementVisibility", Element::eVisibility, create<FbxLayerElementVisibility>, Storage::values, "Visibility",
-     ""},
-    {"LayerElementPolygonGroup", Element::ePolygonGroup, create<FbxLayerElementPolygonGroup>, Storage::groups, "",
-     "PolygonGroup"},
+/// The class of each type. All texture channels have the same.
+struct ElementClass {
+    int type;
+    CreateElement create;
 };
 
-struct MappingRow {
-    std::string_view spelling;
-    Element::EMappingMode mode;
+constexpr ElementClass kClasses[] = {
+    {Element::eNormal, create<FbxLayerElementNormal>},
+    {Element::eBiNormal, create<FbxLayerElementBinormal>},
+    {Element::eTangent, create<FbxLayerElementTangent>},
+    {Element::eVertexColor, create<FbxLayerElementVertexColor>},
+    {Element::eMaterial, create<FbxLayerElementMaterial>},
+    {Element::eSmoothing, create<FbxLayerElementSmoothing>},
+    {Element::eEdgeCrease, create<FbxLayerElementCrease>},
+    {Element::eVertexCrease, create<FbxLayerElementCrease>},
+    {Element::eHole, create<FbxLayerElementHole>},
+    {Element::eVisibility, create<FbxLayerElementVisibility>},
+    {Element::ePolygonGroup, create<FbxLayerElementPolygonGroup>},
+    {Element::eUV, create<FbxLayerElementUV>},
 };
 
-constexpr MappingRow kMappings[] = {
-    {"ByVertice", Element::eByControlPoint},
-    {"ByVertex", Element::eByControlPoint},
-    {"ByControlPoint", Element::eByControlPoint},
-    {"ByPolygonVertex", Element::eByPolygonVertex},
-    {"ByPolygon", Element::eByPolygon},
-    {"ByEdge", Element::eByEdge},
-    {"AllSame", Element::eAllSame},
+CreateElement creatorOf(int type) {
+    for (const ElementClass& row : kClasses) {
+        if (row.type == type)
+            return row.create;
+    }
+    return create<FbxLayerElementTexture>;
+}
+
+struct ElementKind {
+    LayerElementRow row;
+    int slot;
 };
 
 std::optional<ElementKind> kindOf(std::string_view record) {
-    for (const ElementKind& kind : kKinds) {
-        if (kind.record == record)
-            return kind;
+    for (const LayerElementRow& row : kLayerElements) {
+        if (row.record == record)
+            return ElementKind{row, row.type};
     }
-    for (const LayerChannelRow& row : kLayerChannels) {
-        if (row.uvs == record)
-            return ElementKind{row.uvs,  Access::uvSlot(row.channel), create<FbxLayerElementUV>, Storage::values, "UV",
-                               "UVIndex"};
-        if (row.textures == record)
-            return ElementKind{row.textures,     row.channel, create<FbxLayerElementTexture>,
-                               Storage::numbers, "",          "TextureId"};
+    for (const LayerChannelRow& channel : kLayerChannels) {
+        const LayerElementRow textures = texturesRow(channel);
+        if (channel.coordinates == record)
+            return ElementKind{coordinatesRow(channel), Access::uvSlot(static_cast<Element::EType>(textures.type))};
+        if (channel.textures == record)
+            return ElementKind{textures, textures.type};
     }
     return std::nullopt;
 }
 
 std::optional<Element::EMappingMode> mappingOf(const Record& element) {
     const std::string_view text = element.childValue("MappingInformationType").toText();
-    for (const MappingRow& row : kMappings) {
-        if (row.spelling == text)
-            return row.mode;
-    }
-    return std::nullopt;
+    const bool byPoint = numberOf(kControlPointMappings, text, -1) >= 0;
+    const int mode = byPoint ? Element::eByControlPoint : numberOf(kMappingModes, text, Element::eNone);
+    return mode == Element::eNone ? std::nullopt : std::optional(static_cast<Element::EMappingMode>(mode));
 }
 
 const Record* childWithNumbers(const Record& record, std::string_view name) {
@@ -116,13 +99,12 @@ const Record* childWithNumbers(const Record& record, std::string_view name) {
     return child && child->numberCount() > 0 ? child : nullptr;
 }
 
-/// The reference mode that follows from what an element says and which arrays it has. "Index" is what old files say for
-/// "IndexToDirect".
+/// The reference mode that follows from what an element says and which arrays it has.
 Element::EReferenceMode referenceOf(const Record& element, Storage storage, bool hasIndices) {
     if (storage == Storage::groups)
         return Element::eIndex;
-    const bool direct = storage == Storage::values &&
-                        (!hasIndices || element.childValue("ReferenceInformationType").toText() == "Direct");
+    const std::string_view stated = element.childValue("ReferenceInformationType").toText();
+    const bool direct = storage == Storage::values && (!hasIndices || stated == kReferenceModes[Element::eDirect]);
     return direct ? Element::eDirect : Element::eIndexToDirect;
 }
 
@@ -169,18 +151,19 @@ private:
 
     Element* makeElement(const Record& record, const ElementKind& kind) {
         const std::optional<Element::EMappingMode> mapping = mappingOf(record);
-        const Record* direct = childWithNumbers(record, kind.direct);
-        const Record* index = childWithNumbers(record, kind.index);
-        if (!mapping || !(kind.storage == Storage::values ? direct : index))
+        const Record* direct = childWithNumbers(record, kind.row.direct);
+        const Record* index = childWithNumbers(record, kind.row.index);
+        if (!mapping || !(kind.row.storage == Storage::values ? direct : index))
             return nullptr;
         if (*mapping == Element::eByEdge && !childWithNumbers(*mSource.body, "Edges"))
             return nullptr;
-        Element* element = kind.create(mContainer, std::string(record.childValue("Name").toText()).c_str());
+        Element* element =
+            creatorOf(kind.row.type)(mContainer, std::string(record.childValue("Name").toText()).c_str());
         element->SetMappingMode(*mapping);
-        element->SetReferenceMode(referenceOf(record, kind.storage, index != nullptr));
+        element->SetReferenceMode(referenceOf(record, kind.row.storage, index != nullptr));
         if (element->GetReferenceMode() == Element::eDirect)
             index = nullptr;
-        const Record* fourth = childWithNumbers(record, kind.fourth);
+        const Record* fourth = childWithNumbers(record, kind.row.fourth);
         Access::setSource(*element,
                           std::make_unique<ElementSource>(ElementSource{mSource.document, direct, index, fourth}));
         return element;

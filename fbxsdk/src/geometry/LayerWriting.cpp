@@ -12,8 +12,9 @@
 
 #include "document/RecordWriting.h"
 #include "geometry/GeometryWriting.h"
-#include "geometry/LayerChannels.h"
 #include "geometry/LayerElementAccess.h"
+#include "schema/LayerElements.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -25,6 +26,7 @@ using Access = LayerElementAccess;
 /// The element and the records that its arrays have.
 struct ElementRecords {
     const Element& element;
+    const LayerElementRow& row;
     const VersionTraits& traits;
     RecordSink& sink;
 };
@@ -59,30 +61,19 @@ std::vector<double> packed(DirectArray<Item> array, int begin, int end) {
 }
 
 template <class Class>
-void writeIndices(const ElementRecords& records, std::string_view name) {
+void writeIndices(const ElementRecords& records) {
     if (records.element.GetReferenceMode() != Element::eDirect)
-        writeArray<std::int32_t>(records.sink, name, spanOf(indicesOf<Class>(records.element)));
+        writeArray<std::int32_t>(records.sink, records.row.index, spanOf(indicesOf<Class>(records.element)));
 }
 
-/// Three numbers, and from 7.4 on the fourth in a list of its own.
+/// Three numbers, and where the version has it the fourth in a list of its own.
 template <class Class>
-void writeVectors(const ElementRecords& records, std::string_view name, std::string_view fourthName,
-                  std::string_view indexName) {
+void writeVectors(const ElementRecords& records) {
     DirectArray<FbxVector4> direct = directOf<Class>(records.element);
-    writeArray<double>(records.sink, name, packed<FbxVector4>(direct, 0, 3));
+    writeArray<double>(records.sink, records.row.direct, packed<FbxVector4>(direct, 0, 3));
     if (records.traits.fourthNumbers)
-        writeArray<double>(records.sink, fourthName, packed<FbxVector4>(direct, 3, 4));
-    writeIndices<Class>(records, indexName);
-}
-
-void writeNormals(const ElementRecords& records) {
-    writeVectors<FbxLayerElementNormal>(records, "Normals", "NormalsW", "NormalsIndex");
-}
-void writeBinormals(const ElementRecords& records) {
-    writeVectors<FbxLayerElementBinormal>(records, "Binormals", "BinormalsW", "BinormalsIndex");
-}
-void writeTangents(const ElementRecords& records) {
-    writeVectors<FbxLayerElementTangent>(records, "Tangents", "TangentsW", "TangentsIndex");
+        writeArray<double>(records.sink, records.row.fourth, packed<FbxVector4>(direct, 3, 4));
+    writeIndices<Class>(records);
 }
 
 void writeColors(const ElementRecords& records) {
@@ -92,129 +83,126 @@ void writeColors(const ElementRecords& records) {
         const FbxColor color = direct.GetAt(i);
         numbers.insert(numbers.end(), {color.mRed, color.mGreen, color.mBlue, color.mAlpha});
     }
-    writeArray<double>(records.sink, "Colors", numbers);
-    writeIndices<FbxLayerElementVertexColor>(records, "ColorIndex");
+    writeArray<double>(records.sink, records.row.direct, numbers);
+    writeIndices<FbxLayerElementVertexColor>(records);
 }
 
 void writeUVs(const ElementRecords& records) {
-    writeArray<double>(records.sink, "UV", packed<FbxVector2>(directOf<FbxLayerElementUV>(records.element), 0, 2));
-    writeIndices<FbxLayerElementUV>(records, "UVIndex");
+    writeArray<double>(records.sink, records.row.direct,
+                       packed<FbxVector2>(directOf<FbxLayerElementUV>(records.element), 0, 2));
+    writeIndices<FbxLayerElementUV>(records);
 }
 
 void writeSmoothing(const ElementRecords& records) {
-    writeArray<std::int32_t>(records.sink, "Smoothing", spanOf(directOf<FbxLayerElementSmoothing>(records.element)));
+    writeArray<std::int32_t>(records.sink, records.row.direct,
+                             spanOf(directOf<FbxLayerElementSmoothing>(records.element)));
 }
 
-void writeCreases(const ElementRecords& records, std::string_view name) {
+void writeCreases(const ElementRecords& records) {
     DirectArray<double> direct = directOf<FbxLayerElementCrease>(records.element);
-    writeArray<double>(records.sink, name, {direct.GetLocked(), static_cast<std::size_t>(direct.GetCount())});
+    writeArray<double>(records.sink, records.row.direct,
+                       {direct.GetLocked(), static_cast<std::size_t>(direct.GetCount())});
 }
-void writeEdgeCreases(const ElementRecords& records) { writeCreases(records, "EdgeCrease"); }
-void writeVertexCreases(const ElementRecords& records) { writeCreases(records, "VertexCrease"); }
 
 template <class Class>
-void writeFlags(const ElementRecords& records, std::string_view name) {
+void writeFlags(const ElementRecords& records) {
     DirectArray<bool> direct = directOf<Class>(records.element);
     std::vector<std::uint8_t> flags;
     flags.reserve(static_cast<std::size_t>(direct.GetCount()));
     for (int i = 0; i < direct.GetCount(); ++i)
         flags.push_back(direct.GetAt(i) ? 1 : 0);
-    writeArray<std::uint8_t>(records.sink, name, flags);
+    writeArray<std::uint8_t>(records.sink, records.row.direct, flags);
 }
-void writeHoles(const ElementRecords& records) { writeFlags<FbxLayerElementHole>(records, "Hole"); }
-void writeVisibility(const ElementRecords& records) { writeFlags<FbxLayerElementVisibility>(records, "Visibility"); }
 
 void writePolygonGroups(const ElementRecords& records) {
     const bool direct = records.element.GetReferenceMode() == Element::eDirect;
-    writeArray<std::int32_t>(records.sink, "PolygonGroup",
+    writeArray<std::int32_t>(records.sink, records.row.index,
                              spanOf(direct ? directOf<FbxLayerElementPolygonGroup>(records.element)
                                            : indicesOf<FbxLayerElementPolygonGroup>(records.element)));
 }
 
 /// One number for all when nobody gave any: the first material or texture.
 template <class Class>
-void writeNumbers(const ElementRecords& records, std::string_view name) {
+void writeNumbers(const ElementRecords& records) {
     constexpr int kFirst[] = {0};
     std::span<const int> numbers = spanOf(indicesOf<Class>(records.element));
     if (numbers.empty() && records.element.GetMappingMode() == Element::eAllSame)
         numbers = kFirst;
-    writeArray<std::int32_t>(records.sink, name, numbers);
+    writeArray<std::int32_t>(records.sink, records.row.index, numbers);
 }
-void writeMaterials(const ElementRecords& records) { writeNumbers<FbxLayerElementMaterial>(records, "Materials"); }
 
 void writeTextures(const ElementRecords& records) {
     writeText(records.sink, "BlendMode", "Translucent");
     writeReal(records.sink, "TextureAlpha", 1);
-    writeNumbers<FbxLayerElementTexture>(records, "TextureId");
+    writeNumbers<FbxLayerElementTexture>(records);
 }
 
-/// What "by reference" an element is called. Lists of numbers are never direct in files.
-enum class Reference { asSet, indexToDirect, index };
+using WriteElement = void (*)(const ElementRecords& records);
+
+/// What writes the arrays of each type. All texture channels have the same.
+struct ElementWriter {
+    int type;
+    WriteElement write;
+};
+
+constexpr ElementWriter kWriters[] = {
+    {Element::eNormal, writeVectors<FbxLayerElementNormal>},
+    {Element::eBiNormal, writeVectors<FbxLayerElementBinormal>},
+    {Element::eTangent, writeVectors<FbxLayerElementTangent>},
+    {Element::ePolygonGroup, writePolygonGroups},
+    {Element::eVertexColor, writeColors},
+    {Element::eUV, writeUVs},
+    {Element::eSmoothing, writeSmoothing},
+    {Element::eEdgeCrease, writeCreases},
+    {Element::eVisibility, writeFlags<FbxLayerElementVisibility>},
+    {Element::eHole, writeFlags<FbxLayerElementHole>},
+    {Element::eVertexCrease, writeCreases},
+    {Element::eMaterial, writeNumbers<FbxLayerElementMaterial>},
+};
+
+WriteElement writerOf(int type) {
+    for (const ElementWriter& row : kWriters) {
+        if (row.type == type)
+            return row.write;
+    }
+    return writeTextures;
+}
 
 struct ElementKind {
-    std::string_view record;
+    LayerElementRow row;
     int slot;
-    int version;       ///< 0: that of normals
-    int legacyVersion; ///< in files before 7.0
-    Reference reference;
-    void (*write)(const ElementRecords& records);
 };
 
-/// The elements in the order of files, where texture coordinates stand between the two halves and textures behind both.
-const ElementKind kKinds[] = {
-    {"LayerElementNormal", Element::eNormal, 0, 101, Reference::asSet, writeNormals},
-    {"LayerElementBinormal", Element::eBiNormal, 0, 101, Reference::asSet, writeBinormals},
-    {"LayerElementTangent", Element::eTangent, 0, 101, Reference::asSet, writeTangents},
-    {"LayerElementPolygonGroup", Element::ePolygonGroup, 101, 101, Reference::index, writePolygonGroups},
-    {"LayerElementColor", Element::eVertexColor, 101, 101, Reference::asSet, writeColors},
-};
-const ElementKind kKindsBehindUVs[] = {
-    {"LayerElementSmoothing", Element::eSmoothing, 102, 102, Reference::asSet, writeSmoothing},
-    {"LayerElementEdgeCrease", Element::eEdgeCrease, 101, 100, Reference::asSet, writeEdgeCreases},
-    {"LayerElementVisibility", Element::eVisibility, 101, 101, Reference::asSet, writeVisibility},
-    {"LayerElementHole", Element::eHole, 101, 100, Reference::asSet, writeHoles},
-    {"LayerElementVertexCrease", Element::eVertexCrease, 101, 100, Reference::asSet, writeVertexCreases},
-    {"LayerElementMaterial", Element::eMaterial, 101, 101, Reference::indexToDirect, writeMaterials},
-};
-
+/// In the order of files.
 std::vector<ElementKind> allKinds() {
-    std::vector<ElementKind> kinds(std::begin(kKinds), std::end(kKinds));
-    for (const LayerChannelRow& row : kLayerChannels)
-        kinds.push_back({row.uvs, Access::uvSlot(row.channel), 101, 101, Reference::asSet, writeUVs});
-    kinds.insert(kinds.end(), std::begin(kKindsBehindUVs), std::end(kKindsBehindUVs));
-    for (const LayerChannelRow& row : kLayerChannels)
-        kinds.push_back({row.textures, row.channel, 101, 101, Reference::indexToDirect, writeTextures});
+    std::vector<ElementKind> kinds;
+    const auto add = [&](std::span<const LayerElementRow> rows) {
+        for (const LayerElementRow& row : rows)
+            kinds.push_back({row, row.type});
+    };
+    add(std::span(kLayerElements).first(kElementsBeforeCoordinates));
+    for (const LayerChannelRow& channel : kLayerChannels) {
+        const int textures = texturesRow(channel).type;
+        kinds.push_back({coordinatesRow(channel), Access::uvSlot(static_cast<Element::EType>(textures))});
+    }
+    add(std::span(kLayerElements).subspan(kElementsBeforeCoordinates));
+    for (const LayerChannelRow& channel : kLayerChannels)
+        kinds.push_back({texturesRow(channel), texturesRow(channel).type});
     return kinds;
 }
 
-std::string_view mappingName(Element::EMappingMode mode) {
-    switch (mode) {
-    case Element::eByControlPoint:
-        return "ByVertice";
-    case Element::eByPolygonVertex:
-        return "ByPolygonVertex";
-    case Element::eByPolygon:
-        return "ByPolygon";
-    case Element::eByEdge:
-        return "ByEdge";
-    case Element::eAllSame:
-        return "AllSame";
-    case Element::eNone:
+/// Lists of numbers are never direct in files.
+std::string_view referenceName(const Element& element, LayerElementStorage storage) {
+    switch (storage) {
+    case LayerElementStorage::groups:
+        return kReferenceModes[Element::eIndex];
+    case LayerElementStorage::numbers:
+        return kReferenceModes[Element::eIndexToDirect];
+    case LayerElementStorage::values:
         break;
     }
-    return "NoMappingInformation";
-}
-
-std::string_view referenceName(const Element& element, Reference reference) {
-    switch (reference) {
-    case Reference::index:
-        return "Index";
-    case Reference::indexToDirect:
-        return "IndexToDirect";
-    case Reference::asSet:
-        break;
-    }
-    return element.GetReferenceMode() == Element::eDirect ? "Direct" : "IndexToDirect";
+    const bool direct = element.GetReferenceMode() == Element::eDirect;
+    return kReferenceModes[direct ? Element::eDirect : Element::eIndexToDirect];
 }
 
 class LayerWriter {
@@ -264,14 +252,14 @@ private:
     }
 
     void writeElement(const ElementKind& kind, const Element& element, std::int32_t number, RecordSink& sink) const {
-        const int version = kind.version == 0 ? mTraits.normalVersion : kind.version;
-        const BlockScope block(sink, kind.record, number);
-        writeInteger(sink, "Version", mTraits.generation == 7 ? version : kind.legacyVersion);
+        const int version = kind.row.version == 0 ? mTraits.normalVersion : kind.row.version;
+        const BlockScope block(sink, kind.row.record, number);
+        writeInteger(sink, "Version", mTraits.generation == 7 ? version : kind.row.legacyVersion);
         writeText(sink, "Name", element.GetName());
-        writeText(sink, "MappingInformationType", mappingName(element.GetMappingMode()));
-        writeText(sink, "ReferenceInformationType", referenceName(element, kind.reference));
+        writeText(sink, "MappingInformationType", spellingOf(kMappingModes, element.GetMappingMode(), Element::eNone));
+        writeText(sink, "ReferenceInformationType", referenceName(element, kind.row.storage));
         try {
-            kind.write({element, mTraits, sink});
+            writerOf(kind.row.type)({element, kind.row, mTraits, sink});
         } catch (const std::runtime_error&) {
             // A damaged element has no array; it is written without, and read as if it were not there.
         }
@@ -286,7 +274,7 @@ private:
             if (!element)
                 continue;
             const BlockScope entry(sink, "LayerElement");
-            writeText(sink, "Type", kind.record);
+            writeText(sink, "Type", kind.row.record);
             writeInteger(sink, "TypedIndex", mNumbers.at({element, kind.slot}));
         }
     }

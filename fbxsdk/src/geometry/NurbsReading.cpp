@@ -11,26 +11,13 @@
 #include <fbxsdk/FbxTrimNurbsSurface.h>
 
 #include "geometry/NurbsNumbers.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
 using Direction = FbxNurbsSurfaceBase::Direction;
-
-constexpr struct {
-    std::string_view text;
-    FbxNurbsSurfaceBase::EType surface;
-    FbxNurbsCurve::EType curve;
-} kForms[] = {{"Open", FbxNurbsSurfaceBase::eOpen, FbxNurbsCurve::eOpen},
-              {"Closed", FbxNurbsSurfaceBase::eClosed, FbxNurbsCurve::eClosed},
-              {"Periodic", FbxNurbsSurfaceBase::ePeriodic, FbxNurbsCurve::ePeriodic}};
-
-const auto& formOf(const Value& value) {
-    const auto* found = std::find_if(std::begin(kForms), std::end(kForms),
-                                     [&](const auto& form) { return form.text == value.toText(); });
-    return found == std::end(kForms) ? kForms[0] : *found;
-}
 
 bool isOrder(std::int64_t order, std::int64_t points) { return order >= 2 && order <= points; }
 
@@ -83,7 +70,8 @@ private:
     }
     [[nodiscard]] FbxNurbsSurfaceBase::EType form(std::size_t index) const {
         const Record* record = mBody.child("Form");
-        return record ? formOf(record->value(index)).surface : FbxNurbsSurfaceBase::eOpen;
+        const std::string_view stated = record ? record->value(index).toText() : std::string_view();
+        return static_cast<FbxNurbsSurfaceBase::EType>(numberOf(kSurfaceForms, stated, FbxNurbsSurfaceBase::eOpen));
     }
 
     bool readDirection(Direction& direction, std::size_t index) const {
@@ -124,7 +112,7 @@ void readNurbsSurface(FbxNurbsSurface& surface, const Record& body) {
 }
 
 void readNurbsCurve(FbxNurbsCurve& curve, const Record& body) {
-    const auto& form = formOf(body.childValue("Form"));
+    const int form = numberOf(kCurveForms, body.childValue("Form").toText(), FbxNurbsCurve::eOpen);
     const Record* points = body.child("Points");
     const std::size_t numbers = points ? points->numberCount() : 0;
     const std::int64_t order = body.childValue("Order").toInteger();
@@ -133,7 +121,7 @@ void readNurbsCurve(FbxNurbsCurve& curve, const Record& body) {
         return;
     FbxNurbsCurve::Content content;
     content.order = static_cast<int>(order);
-    content.type = form.curve;
+    content.type = static_cast<FbxNurbsCurve::EType>(form);
     content.dimension = body.childValue("Dimension").toInteger(3) == 2 ? FbxNurbsCurve::e2D : FbxNurbsCurve::e3D;
     content.rational = body.childValue("Rational").toInteger() != 0;
     content.step = stepOf(body.childValue("Step").toInteger(kUsualStep));

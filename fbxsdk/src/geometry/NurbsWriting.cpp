@@ -15,6 +15,7 @@
 
 #include "document/RecordWriting.h"
 #include "geometry/NurbsNumbers.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -40,27 +41,7 @@ std::span<const Number> spanOf(const Number* numbers, int count) {
 }
 
 std::string_view formName(FbxNurbsSurfaceBase::EType type) {
-    switch (type) {
-    case FbxNurbsSurfaceBase::ePeriodic:
-        return "Periodic";
-    case FbxNurbsSurfaceBase::eClosed:
-        return "Closed";
-    case FbxNurbsSurfaceBase::eOpen:
-        break;
-    }
-    return "Open";
-}
-
-std::string_view formName(FbxNurbsCurve::EType type) {
-    switch (type) {
-    case FbxNurbsCurve::ePeriodic:
-        return "Periodic";
-    case FbxNurbsCurve::eClosed:
-        return "Closed";
-    case FbxNurbsCurve::eOpen:
-        break;
-    }
-    return "Open";
+    return spellingOf(kSurfaceForms, type, FbxNurbsSurfaceBase::eOpen);
 }
 
 /// What the two classes of surfaces call their records.
@@ -91,27 +72,13 @@ void writeCurve(const FbxNurbsCurve& curve, RecordSink& sink) {
     // kept: the applications' files have no such record; it is written for those who ask for another step.
     if (curve.GetStep() != kUsualStep)
         writeInteger(sink, "Step", curve.GetStep());
-    writeText(sink, "Form", formName(curve.GetType()));
+    writeText(sink, "Form", spellingOf(kCurveForms, curve.GetType(), FbxNurbsCurve::eOpen));
     writeInteger(sink, "Rational", curve.IsRational() ? 1 : 0);
     writePoints(sink, curve, 4);
     writeArray(sink, "KnotVector", spanOf<double>(curve.GetKnotVector(), curve.GetKnotCount()));
 }
 
-std::string_view patchTypeName(FbxPatch::EType type) {
-    switch (type) {
-    case FbxPatch::eBezier:
-        return "Bezier";
-    case FbxPatch::eBezierQuadric:
-        return "BezierQuadric";
-    case FbxPatch::eCardinal:
-        return "Cardinal";
-    case FbxPatch::eBSpline:
-        return "BSpline";
-    case FbxPatch::eLinear:
-        return "Linear";
-    }
-    return "Bezier";
-}
+std::string_view patchTypeName(FbxPatch::EType type) { return spellingOf(kPatchTypes, type, FbxPatch::eBezier); }
 
 void writePatch(const FbxPatch& patch, RecordSink& sink) {
     writeText(sink, "Type", "Patch");

@@ -4,31 +4,24 @@
 // Records of patches.
 #include "geometry/PatchReading.h"
 
+#include <algorithm>
 #include <string_view>
 
 #include <fbxsdk/FbxPatch.h>
 
 #include "geometry/NurbsNumbers.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-constexpr struct {
-    std::string_view text;
-    FbxPatch::EType type;
-} kTypes[] = {{"Bezier", FbxPatch::eBezier},
-              {"BezierQuadric", FbxPatch::eBezierQuadric},
-              {"Cardinal", FbxPatch::eCardinal},
-              {"BSpline", FbxPatch::eBSpline},
-              {"Linear", FbxPatch::eLinear}};
-
 /// By name or by number; anything else is a Bezier patch.
 FbxPatch::EType typeOf(const Value& value) {
-    for (const auto& row : kTypes)
-        if (row.text == value.toText() || (value.isNumber() && value.toInteger() == row.type))
-            return row.type;
-    return FbxPatch::eBezier;
+    const int stated = static_cast<int>(std::clamp<std::int64_t>(value.toInteger(-1), -1, kPatchTypes.size()));
+    const std::string_view spelling =
+        value.isNumber() ? spellingOf(kPatchTypes, stated, FbxPatch::eBezier) : value.toText();
+    return static_cast<FbxPatch::EType>(numberOf(kPatchTypes, spelling, FbxPatch::eBezier));
 }
 
 bool flag(const Record* record, std::size_t index) { return integerAt(record, index, 0) != 0; }

@@ -3,6 +3,7 @@
 #include "io/SchemaClass.h"
 
 #include "schema/Schema.h"
+#include "schema/Spellings.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -25,18 +26,18 @@ constinit const SchemaClass kClasses[] = {
     {"Model", kAny, "Model", &kFbxNodeInfo, kNodeRows},
 
     {"NodeAttribute", "Null", "NodeAttribute", &kFbxNullInfo, kNullRows},
-    {"NodeAttribute", "LimbNode", "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
-    {"NodeAttribute", "Limb", "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
-    {"NodeAttribute", "Root", "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
-    {"NodeAttribute", "Effector", "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
+    {"NodeAttribute", kSkeletonTypes[2], "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
+    {"NodeAttribute", kSkeletonTypes[1], "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
+    {"NodeAttribute", kSkeletonTypes[0], "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
+    {"NodeAttribute", kSkeletonTypes[3], "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
     {"NodeAttribute", "Camera", "NodeAttribute", &kFbxCameraInfo, kCameraRows},
     {"NodeAttribute", "CameraStereo", "NodeAttribute", &kFbxCameraStereoInfo, kCameraStereoRows},
     {"NodeAttribute", "CameraSwitcher", "NodeAttribute", &kFbxCameraSwitcherInfo, kCameraSwitcherRows},
     {"NodeAttribute", "Light", "NodeAttribute", &kFbxLightInfo, kLightRows},
-    {"NodeAttribute", "Marker", "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
-    {"NodeAttribute", "OpticalMarker", "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
-    {"NodeAttribute", "FKEffector", "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
-    {"NodeAttribute", "IKEffector", "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
+    {"NodeAttribute", kMarkerTypes[0], "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
+    {"NodeAttribute", kMarkerTypes[1], "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
+    {"NodeAttribute", kMarkerTypes[2], "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
+    {"NodeAttribute", kMarkerTypes[3], "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
     {"NodeAttribute", "LodGroup", "NodeAttribute", &kFbxLODGroupInfo, kLodGroupRows},
     {"NodeAttribute", "OpticalReference", "NodeAttribute", &kFbxOpticalReferenceInfo, kNodeAttributeRows},
     {"NodeAttribute", "CachedEffect", "NodeAttribute", &kFbxCachedEffectInfo, kNodeAttributeRows},

@@ -14,29 +14,31 @@
 
 #include "object/ObjectData.h"
 #include "scene/NodeTree.h"
+#include "schema/ProducerCameras.h"
 
 FBXSDK_NAMESPACE_BEGIN
 
 namespace {
 
-constexpr const char* kSwitcherName = "Camera Switcher";
+using Place = detail::ProducerCamera::Place;
+constexpr const char* nameOf(Place place) { return detail::kProducerCameraNames[place]; }
 
 /// The viewing cameras of the application that the format comes from; figures of the files it writes.
-struct ProducerCamera {
+struct ProducerRow {
     const char* name;
     double position[3];
     double up[3];
     FbxCamera::EProjectionType projection;
     double nearPlane, farPlane;
 };
-constexpr ProducerCamera kProducerCameras[] = {
-    {"Producer Perspective", {0, 71.3, 287.5}, {0, 1, 0}, FbxCamera::ePerspective, 10, 4000},
-    {"Producer Top", {0, 4000, 0}, {0, 0, -1}, FbxCamera::eOrthogonal, 1, 30000},
-    {"Producer Bottom", {0, -4000, 0}, {0, 0, -1}, FbxCamera::eOrthogonal, 1, 30000},
-    {"Producer Front", {0, 0, 4000}, {0, 1, 0}, FbxCamera::eOrthogonal, 1, 30000},
-    {"Producer Back", {0, 0, -4000}, {0, 1, 0}, FbxCamera::eOrthogonal, 1, 30000},
-    {"Producer Right", {4000, 0, 0}, {0, 1, 0}, FbxCamera::eOrthogonal, 1, 30000},
-    {"Producer Left", {-4000, 0, 0}, {0, 1, 0}, FbxCamera::eOrthogonal, 1, 30000},
+constexpr ProducerRow kProducerCameras[] = {
+    {nameOf(Place::perspective), {0, 71.3, 287.5}, {0, 1, 0}, FbxCamera::ePerspective, 10, 4000},
+    {nameOf(Place::top), {0, 4000, 0}, {0, 0, -1}, FbxCamera::eOrthogonal, 1, 30000},
+    {nameOf(Place::bottom), {0, -4000, 0}, {0, 0, -1}, FbxCamera::eOrthogonal, 1, 30000},
+    {nameOf(Place::front), {0, 0, 4000}, {0, 1, 0}, FbxCamera::eOrthogonal, 1, 30000},
+    {nameOf(Place::back), {0, 0, -4000}, {0, 1, 0}, FbxCamera::eOrthogonal, 1, 30000},
+    {nameOf(Place::right), {4000, 0, 0}, {0, 1, 0}, FbxCamera::eOrthogonal, 1, 30000},
+    {nameOf(Place::left), {-4000, 0, 0}, {0, 1, 0}, FbxCamera::eOrthogonal, 1, 30000},
 };
 constexpr double kProducerFieldOfView = 40.0;
 constexpr double kProducerFocalLength = 21.354493494969105; // what 40° are over a film height of 0.612 inch
@@ -49,7 +51,7 @@ FbxNode* makeNode(FbxScene& scene, const char* name, FbxNodeAttribute& attribute
     return node;
 }
 
-FbxCamera* makeProducerCamera(FbxScene& scene, const ProducerCamera& row) {
+FbxCamera* makeProducerCamera(FbxScene& scene, const ProducerRow& row) {
     FbxCamera* camera = FbxCamera::Create(&scene, row.name);
     camera->Position.Set(FbxDouble3(row.position[0], row.position[1], row.position[2]));
     camera->UpVector.Set(FbxDouble3(row.up[0], row.up[1], row.up[2]));
@@ -64,9 +66,9 @@ FbxCamera* makeProducerCamera(FbxScene& scene, const ProducerCamera& row) {
 }
 
 bool isFixedName(const char* name) {
-    return std::strcmp(name, kSwitcherName) == 0 ||
+    return std::strcmp(name, detail::kCameraSwitcherName) == 0 ||
            std::any_of(std::begin(kProducerCameras), std::end(kProducerCameras),
-                       [&](const ProducerCamera& row) { return std::strcmp(row.name, name) == 0; });
+                       [&](const ProducerRow& row) { return std::strcmp(row.name, name) == 0; });
 }
 
 /// Several nodes may bear the name; one of them being a camera is enough.
@@ -105,8 +107,8 @@ void FbxGlobalCameraSettings::CreateProducerCameras() {
     }
     if (mSwitcher)
         return;
-    mSwitcher = FbxCameraSwitcher::Create(mScene, kSwitcherName);
-    makeNode(*mScene, kSwitcherName, *mSwitcher);
+    mSwitcher = FbxCameraSwitcher::Create(mScene, detail::kCameraSwitcherName);
+    makeNode(*mScene, detail::kCameraSwitcherName, *mSwitcher);
 }
 
 void FbxGlobalCameraSettings::DestroyProducerCameras() {

@@ -136,6 +136,14 @@ FbxDataType dataTypeOf(std::string_view typeName, std::string_view subTypeName) 
     return FbxBlobDT;
 }
 
+std::string_view subTypeOf(std::string_view typeName) {
+    for (const PropertyTypeInfo& row : kTypes) {
+        if (typeName == row.typeName)
+            return row.subTypeName;
+    }
+    return {};
+}
+
 std::size_t componentCount(EFbxType type) {
     switch (type) {
     case eFbxDouble2:

@@ -18,6 +18,16 @@ namespace detail {
 inline constexpr std::array<std::string_view, 4> kSkeletonTypes = {"Root", "Limb", "LimbNode", "Effector"};
 /// The sub-class of a marker.
 inline constexpr std::array<std::string_view, 4> kMarkerTypes = {"Marker", "OpticalMarker", "FKEffector", "IKEffector"};
+/// How a skin blends: FbxSkin::EType.
+inline constexpr std::array<std::string_view, 4> kSkinningTypes = {"Rigid", "Linear", "DualQuaternion", "Blend"};
+/// How a cluster counts: FbxCluster::ELinkMode. Files leave the first out.
+inline constexpr std::array<std::string_view, 3> kLinkModes = {"Normalize", "Additive", "Total1"};
+/// The form of a surface in a direction, FbxNurbsSurfaceBase::EType, and of a curve: FbxNurbsCurve::EType.
+inline constexpr std::array<std::string_view, 3> kSurfaceForms = {"Periodic", "Closed", "Open"};
+inline constexpr std::array<std::string_view, 3> kCurveForms = {"Open", "Closed", "Periodic"};
+/// The type of a patch in a direction: FbxPatch::EType.
+inline constexpr std::array<std::string_view, 5> kPatchTypes = {"Bezier", "BezierQuadric", "Cardinal", "BSpline",
+                                                                "Linear"};
 /// The letter of a node's shading mode. Y, W and T are certain, by who writes them where; the others follow the modes'
 /// names.
 inline constexpr std::array<char, 6> kShadingModes = {'Y', 'W', 'F', 'L', 'T', 'U'};

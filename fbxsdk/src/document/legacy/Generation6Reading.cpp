@@ -11,6 +11,7 @@
 #include "document/legacy/LegacySettings.h"
 #include "document/legacy/LegacyTakes.h"
 #include "schema/PropertyFlags.h"
+#include "schema/PropertyTypes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

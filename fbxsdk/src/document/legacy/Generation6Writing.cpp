@@ -6,10 +6,12 @@
 #include <algorithm>
 
 #include "document/DocumentSections.h"
+#include "document/PropertyNames.h"
 #include "document/PropertyWriting.h"
 #include "document/RecordWriting.h"
 #include "document/legacy/LegacyLayout.h"
 #include "document/legacy/TakeWriting.h"
+#include "schema/OldNames.h"
 #include "schema/PropertyFlags.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -44,15 +46,6 @@ template <std::size_t size>
 std::size_t rankIn(const std::string_view (&order)[size], std::string_view record) {
     return static_cast<std::size_t>(std::find(std::begin(order), std::end(order), record) - std::begin(order));
 }
-
-struct Rate {
-    std::int64_t timeMode;
-    std::string_view framesPerSecond;
-};
-/// The second way in which files state the frame rate; by time mode.
-constexpr Rate kRates[] = {{0, "30"},    {1, "120"},     {2, "100"},   {3, "60"},    {4, "50"},    {5, "48"},
-                           {6, "30"},    {7, "30"},      {8, "29.97"}, {9, "29.97"}, {10, "25"},   {11, "24"},
-                           {12, "1000"}, {13, "23.976"}, {15, "96"},   {16, "72"},   {17, "59.94"}};
 
 class Generation6Writer {
 public:
@@ -307,9 +300,10 @@ private:
         writeLong(mSink, "TimeLineStopTime", setting("TimeSpanStop").toInteger());
     }
 
+    /// The second way in which files state it.
     [[nodiscard]] std::string frameRate() const {
         const std::int64_t mode = setting("TimeMode").toInteger();
-        for (const Rate& rate : kRates) {
+        for (const LegacyRateRow& rate : kLegacyRates) {
             if (rate.timeMode == mode)
                 return std::string(rate.framesPerSecond);
         }

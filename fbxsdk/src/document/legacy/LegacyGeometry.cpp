@@ -6,6 +6,8 @@
 
 #include <algorithm>
 
+#include "schema/LayerElements.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
@@ -22,6 +24,14 @@ constexpr std::string_view kReplacedRecords[] = {
 
 /// Files of this version have a normal per control point even where the counts say nothing.
 constexpr std::uint32_t kPointNormalsVersion = 5000;
+
+// Of the tables of layer elements: the rows, mappings and references that older geometry has.
+constexpr const LayerElementRow& kNormalElements = kLayerElements[0];
+constexpr const LayerElementRow& kMaterialElements = kLayerElements[std::size(kLayerElements) - 1];
+static_assert(kNormalElements.type == LayerElementType::normal && kMaterialElements.type == LayerElementType::material);
+constexpr std::string_view kByControlPoint = kMappingModes[1], kByPolygonVertex = kMappingModes[2],
+                           kByPolygon = kMappingModes[3];
+constexpr std::string_view kDirect = kReferenceModes[0], kIndexToDirect = kReferenceModes[2];
 
 class GeometryBuilder {
 public:
@@ -82,8 +92,8 @@ private:
         const std::size_t corners = countOf("PolygonVertexIndex");
         const bool ambiguous = points == corners && mBuilder.document().version != kPointNormalsVersion;
         const bool perPoint = normals->numberCount() / 3 == points && !ambiguous;
-        element("LayerElementNormal", 0, perPoint ? "ByVertice" : "ByPolygonVertex", "Direct")
-            .add(mBuilder.aliasOf(*normals, "Normals"));
+        element(kNormalElements.record, 0, perPoint ? kByControlPoint : kByPolygonVertex, kDirect)
+            .add(mBuilder.aliasOf(*normals, kNormalElements.direct));
     }
 
     void addMaterials() {
@@ -91,7 +101,8 @@ private:
         const std::string_view assignation = mModel.childValue("MaterialAssignation").toText();
         if (!materials || materials->numberCount() == 0 || assignation.empty())
             return;
-        element("LayerElementMaterial", 0, assignation, "IndexToDirect").add(mBuilder.aliasOf(*materials, "Materials"));
+        element(kMaterialElements.record, 0, assignation, kIndexToDirect)
+            .add(mBuilder.aliasOf(*materials, kMaterialElements.index));
     }
 
     void addUvs(const Record& info, std::int64_t index) {
@@ -100,11 +111,12 @@ private:
         if (!uvs || uvs->numberCount() == 0)
             return;
         const std::string_view mapping = info.childValue("MappingInformationType").toText();
-        ChildAppender children = element("LayerElementUV", index, mapping == "ByPolygon" ? "ByPolygonVertex" : mapping,
-                                         indices ? "IndexToDirect" : "Direct");
-        children.add(mBuilder.aliasOf(*uvs, "UV"));
+        constexpr LayerElementRow kRow = coordinatesRow(kLayerChannels[0]);
+        ChildAppender children = element(kRow.record, index, mapping == kByPolygon ? kByPolygonVertex : mapping,
+                                         indices ? kIndexToDirect : kDirect);
+        children.add(mBuilder.aliasOf(*uvs, kRow.direct));
         if (indices)
-            children.add(mBuilder.aliasOf(*indices, "UVIndex"));
+            children.add(mBuilder.aliasOf(*indices, kRow.index));
     }
 
     /// One layer per element index; the first has all the others as well.

@@ -4,6 +4,8 @@
 // Two passes: names that stand alone stay as they are, whatever numbered names their neighbours need.
 #include "document/legacy/LegacyNames.h"
 
+#include "container/FileFormat.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
@@ -13,7 +15,7 @@ constexpr std::string_view kRootClass = "Model", kRootName = "Scene";
 
 std::string keyOf(std::string_view nameClass, std::string_view name) {
     std::string key(nameClass);
-    key += "::";
+    key += kAsciiNameSeparator;
     key += name;
     return key;
 }

@@ -1,26 +1,18 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Tables of the settings records, and the frame rates among the time modes.
+// Tables of the settings records.
 #include "document/legacy/LegacySettings.h"
 
 #include <algorithm>
 #include <charconv>
 #include <cmath>
 
+#include "schema/OldNames.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
-
-struct RateRow {
-    double framesPerSecond;
-    int timeMode;
-};
-constexpr RateRow kRates[] = {
-    {24, 11}, {25, 10}, {30, 6},    {60, 3},  {50, 4},    {48, 5},      {120, 1},
-    {100, 2}, {96, 15}, {1000, 12}, {72, 16}, {29.97, 9}, {23.976, 13}, {59.94, 17},
-};
-constexpr int kCustomTimeMode = 14;
 
 bool hasSetting(const Document& document, std::string_view name) {
     return std::any_of(document.globalSettings.begin(), document.globalSettings.end(),
@@ -65,32 +57,35 @@ void readRenderer(DocumentBuilder& builder, const Record& record) {
         addSetting(builder, propertyOf("DefaultCamera", "KString", "", "", record.child("DefaultCamera")->values));
 }
 
-/// Frames per second from text or number; 0 when it is neither.
-double rateOf(const Value& value) {
-    if (value.isNumber())
-        return value.toReal();
-    const std::string_view text = value.toText();
+/// Frames per second; 0 when the text is no number.
+double rateOf(std::string_view text) {
     double rate = 0;
     const auto result = std::from_chars(text.data(), text.data() + text.size(), rate);
     return result.ec == std::errc() ? rate : 0;
+}
+
+std::int64_t timeModeOf(double rate) {
+    constexpr double kTolerance = 0.005;
+    for (const LegacyRateRow& row : kLegacyRates) {
+        if (row.read && std::abs(rateOf(row.framesPerSecond) - rate) < kTolerance)
+            return row.timeMode;
+    }
+    return kCustomTimeMode;
 }
 
 void addFrameRate(DocumentBuilder& builder, double rate) {
     // Each file of these generations has a time mode as well, but in another numbering.
     if (!(rate > 0) || !std::isfinite(rate) || hasSetting(builder.document(), "TimeMode"))
         return;
-    constexpr double kTolerance = 0.005;
-    const auto* row = std::find_if(std::begin(kRates), std::end(kRates), [&](const RateRow& candidate) {
-        return std::abs(candidate.framesPerSecond - rate) < kTolerance;
-    });
-    const int mode = row == std::end(kRates) ? kCustomTimeMode : row->timeMode;
+    const std::int64_t mode = timeModeOf(rate);
     addSetting(builder, propertyOf("TimeMode", "enum", "", "", builder.keep({Value::ofInteger(mode)})));
     if (mode == kCustomTimeMode)
         addSetting(builder, propertyOf("CustomFrameRate", "double", "Number", "", builder.keep({Value::ofReal(rate)})));
 }
 
 void readSettings(DocumentBuilder& builder, const Record& record) {
-    addFrameRate(builder, rateOf(record.childValue("FrameRate")));
+    const Value& rate = record.childValue("FrameRate");
+    addFrameRate(builder, rate.isNumber() ? rate.toReal() : rateOf(rate.toText()));
     constexpr std::pair<std::string_view, std::string_view> kTimes[] = {{"TimeLineStartTime", "TimeSpanStart"},
                                                                         {"TimeLineStopTime", "TimeSpanStop"}};
     for (const auto& [recordName, property] : kTimes)

@@ -13,6 +13,7 @@
 
 #include "document/CurveWriting.h"
 #include "document/DocumentSections.h"
+#include "document/PropertyNames.h"
 #include "document/RecordWriting.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -28,10 +29,6 @@ constexpr TransformRow kTransformRows[] = {
 
 constexpr std::array<std::string_view, 4> kAxes{"X", "Y", "Z", "W"};
 constexpr std::string_view kPrefix = "d|";
-
-constexpr struct {
-    std::string_view subClass, name, legacyName;
-} kRenamings[] = {{"Light", "InnerAngle", "HotSpot"}, {"Light", "OuterAngle", "Cone angle"}};
 
 bool isTransform(std::string_view property) {
     return std::any_of(std::begin(kTransformRows), std::end(kTransformRows),
@@ -173,14 +170,6 @@ private:
 };
 
 } // namespace
-
-std::string_view legacyPropertyName(std::string_view subClass, std::string_view name) {
-    for (const auto& row : kRenamings) {
-        if (row.subClass == subClass && row.name == name)
-            return row.legacyName;
-    }
-    return name;
-}
 
 void writeLegacyTakes(const LegacyLayout& layout, const VersionTraits& traits, RecordSink& sink) {
     sink.heading("Takes and animation section");

@@ -12,8 +12,5 @@ namespace detail {
 /// The section with all takes and their animation.
 void writeLegacyTakes(const LegacyLayout& layout, const VersionTraits& traits, RecordSink& sink);
 
-/// How files before 7.0 call a property of a kind of attribute.
-[[nodiscard]] std::string_view legacyPropertyName(std::string_view subClass, std::string_view name);
-
 } // namespace detail
 FBXSDK_NAMESPACE_END
