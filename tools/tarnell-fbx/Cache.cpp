@@ -138,7 +138,7 @@ std::string kindText(const CacheFacts& facts) {
     std::string text = std::string("Maya cache, ") + (facts.wide ? "64-bit" : "32-bit") + " chunks, " +
                        (facts.oneFile ? "all samples in one file" : "a file per sample");
     if (facts.frameRate > 0.0)
-        return text + ", " + numberText(facts.frameRate) + " frames per second";
+        return text + ", " + rateText(facts.frameRate);
     return text + ", without description (frames below at 24 per second)";
 }
 

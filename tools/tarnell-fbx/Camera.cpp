@@ -71,8 +71,9 @@ std::string filmBackText(const CameraFacts& camera, const CameraMoment& moment) 
 
 std::string pictureText(const CameraFacts& camera, const CameraMoment& moment) {
     if (camera.pictureAspect <= 0.0)
-        return "not stated: the picture is the film";
-    std::string text = rounded(camera.resolution[0], 3) + " × " + rounded(camera.resolution[1], 3);
+        return "none: the picture is the film";
+    std::string text = camera.resolutionStated ? "" : "not stated, the format assumes ";
+    text += rounded(camera.resolution[0], 3) + " × " + rounded(camera.resolution[1], 3);
     if (camera.pixelAspect != 1.0)
         text += ", pixels " + rounded(camera.pixelAspect, 4) + ":1";
     if (camera.orthographic)
@@ -200,7 +201,7 @@ void printCamera(const CameraFacts& camera, const CameraOptions& options, const 
 }
 
 std::string takeText(const TakeFacts& take) {
-    const std::string rate = numberText(std::round(take.frameRate * 1e4) / 1e4) + " frames per second";
+    const std::string rate = rateText(take.frameRate);
     if (!take.exists)
         return "no take, " + rate;
     return "take " + inQuotes(take.name) + ", frames " + std::to_string(take.firstFrame) + " to " +
@@ -299,6 +300,7 @@ void printOptics(const CameraFacts& camera, JsonWriter& json) {
     json.beginObject();
     json.real("width", camera.resolution[0]);
     json.real("height", camera.resolution[1]);
+    json.boolean("stated", camera.resolutionStated);
     json.real("pixelAspect", camera.pixelAspect);
     json.integer("mode", camera.aspectMode);
     json.real("aspect", camera.pictureAspect);

@@ -8,6 +8,8 @@
 #include <cmath>
 #include <unordered_map>
 
+#include <fbxsdk/extensions/FileFacts.h>
+
 #include "CameraOrigins.h"
 #include "Curves.h"
 #include "FaithfulRead.h"
@@ -139,6 +141,7 @@ private:
         facts.driver = driverOf(camera);
         facts.squeeze = camera.FilmSqueezeRatio.Get();
         facts.resolution = {camera.AspectWidth.Get(), camera.AspectHeight.Get()};
+        facts.resolutionStated = extensions::isStated(camera.AspectWidth) || extensions::isStated(camera.AspectHeight);
         facts.pixelAspect = camera.PixelAspectRatio.Get();
         facts.aspectMode = camera.AspectRatioMode.Get<FbxInt>();
         facts.pictureAspect = pictureAspect(camera);

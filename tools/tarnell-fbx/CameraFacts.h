@@ -88,6 +88,7 @@ public:
     std::array<double, 2> resolution{}; ///< as the file has it; zeros when it has none
     double pixelAspect = 1.0;
     int aspectMode = 0;
+    bool resolutionStated = false; ///< false: the resolution is what the format assumes
     double pictureAspect = 0.0; ///< 0 where the file has no resolution: the picture is the film
     GateFit gateFit = GateFit::none;
     Vector3 scale{1.0, 1.0, 1.0}; ///< of the camera in the file's world

@@ -257,7 +257,7 @@ void printSamples(const Curves& curves, const Terminal& terminal, std::ostream& 
 void printTitle(const Curves& curves, Page& page, std::ostream& out) {
     out << page.terminal().paint(Ink::heading, spoken(page.file()))
         << (curves.take ? "  take " + inQuotes(curves.take->GetName()) : "  no take") << ", "
-        << numberText(curves.file.frameRate()) << " frames per second, unit "
+        << rateText(curves.file.frameRate()) << ", unit "
         << unitName(curves.file.scene().GetGlobalSettings().GetSystemUnit().GetScaleFactor()) << '\n'
         << "Values as the file has them, slopes per second.\n";
     if (curves.channels.empty())

@@ -183,7 +183,7 @@ void printText(const Facts& facts, FbxNode& root, Page& page) {
     lines.line("Unit", unitName(facts.unit));
     lines.line("Axes", facts.axes.up + " up, " + facts.axes.toViewer + " to the viewer, " +
                            (facts.axes.rightHanded ? "right-handed" : "left-handed"));
-    lines.line("Frame rate", numberText(facts.frameRate) + " frames per second");
+    lines.line("Frame rate", rateText(facts.frameRate));
     if (facts.stacks.empty())
         lines.line("Stacks", "none");
     for (std::size_t i = 0; i < facts.stacks.size(); ++i)

@@ -64,12 +64,16 @@ void filmShapeDiffers(const LintContext& context, LintReport& report) {
     for (const CameraFacts& camera : context.cameras.cameras) {
         const CameraMoment moment = firstMoment(context, camera);
         const double film = moment.film.aspect();
-        if (camera.orthographic || camera.pictureAspect <= 0.0 || !isPositive(film) ||
+        if (camera.orthographic || !camera.resolutionStated || camera.pictureAspect <= 0.0 || !isPositive(film) ||
             std::abs(camera.pictureAspect / film - 1.0) <= kTolerance)
             continue;
-        report.add(camera.name, "the film is " + rounded(film, 4) + ":1, the picture " +
-                                    rounded(camera.pictureAspect, 4) + ":1; gate fit " + gateFitName(camera.gateFit) +
-                                    " makes " + inDecimals(moment.fovX, 3) + "° × " + inDecimals(moment.fovY, 3) +
+        const std::string shapes =
+            "the film is " + rounded(film, 4) + ":1, the picture " + rounded(camera.pictureAspect, 4) + ":1; gate fit ";
+        if (camera.gateFit == GateFit::none) {
+            report.add(camera.name, shapes + "none leaves open which angle is kept");
+            continue;
+        }
+        report.add(camera.name, shapes + gateFitName(camera.gateFit) + " makes " + inDecimals(moment.fovX, 3) + "° × " + inDecimals(moment.fovY, 3) +
                                     "° into " + inDecimals(moment.pictureFovX, 3) + "° × " +
                                     inDecimals(moment.pictureFovY, 3) + "°");
     }
@@ -163,11 +167,10 @@ void imageShiftNotRead(const LintContext& context, LintReport& report) {
 
 void noResolution(const LintContext& context, LintReport& report) {
     for (const CameraFacts& camera : context.cameras.cameras) {
-        const FbxCamera& source = attributeOf(camera);
         if (camera.pictureAspect <= 0.0) {
             report.add(camera.name, "a picture of " + rounded(camera.resolution[0], 3) + " × " +
                                         rounded(camera.resolution[1], 3) + " is none");
-        } else if (!extensions::isStated(source.AspectWidth) && !extensions::isStated(source.AspectHeight)) {
+        } else if (!camera.resolutionStated) {
             report.add(camera.name, "the file states no resolution; 320 × 200 is what the format assumes");
         }
     }

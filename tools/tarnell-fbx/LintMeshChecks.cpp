@@ -185,8 +185,7 @@ void cacheRate(const LintContext& context, LintReport& report) {
         constexpr double kTolerance = 0.02;
         if (readFacts(used, facts) && facts.frameRate > 0.0 &&
             std::abs(facts.frameRate - context.first.frameRate) > kTolerance)
-            report.add(nameOf(*used.mesh), numberText(facts.frameRate) + " frames per second, and the file has " +
-                                               numberText(context.first.frameRate));
+            report.add(nameOf(*used.mesh), rateText(facts.frameRate) + ", and the file has " + rateText(context.first.frameRate));
     });
 }
 

@@ -25,8 +25,7 @@ void rateUnstated(const LintContext& context, LintReport& report) {
     if (context.stacks.empty())
         return;
     if (settings.GetTimeMode() == FbxTime::eDefaultMode)
-        report.add("", "the time mode is 0, the application's default; read as " + numberText(context.first.frameRate) +
-                           " frames per second");
+        report.add("", "the time mode is 0, the application's default; read as " + rateText(context.first.frameRate));
     for (const FbxString& warning : context.file.importer().GetFileHeaderInfo()->mWarnings) {
         const std::string text = warning.Buffer();
         if (text.find("states no frame rate") != std::string::npos)

@@ -114,8 +114,16 @@ private:
     }
 
     void matchIfAlike(FbxNode& a, FbxNode* b) {
-        if (b && !mOfA.count(&a) && !mOfB.count(b) && std::string_view(kindOf(a)) == kindOf(*b))
+        if (b && !mOfA.count(&a) && !mOfB.count(b) && std::string_view(kindOf(a)) == kindOf(*b) && areAsLarge(a, *b))
             match(a, *b);
+    }
+
+    /// A mesh with another name and other points is another mesh.
+    static bool areAsLarge(FbxNode& a, FbxNode& b) {
+        FbxMesh *meshA = a.GetMesh(), *meshB = b.GetMesh();
+        return !meshA || !meshB ||
+               (meshA->GetControlPointsCount() == meshB->GetControlPointsCount() &&
+                meshA->GetPolygonCount() == meshB->GetPolygonCount());
     }
 
     /// What is left below a parent: for each kind the only node, or null where there are several.

@@ -18,6 +18,10 @@ std::string numberText(double value) {
     return text;
 }
 
+std::string rateText(double framesPerSecond) {
+    return numberText(std::round(framesPerSecond * 1e4) / 1e4) + " frames per second";
+}
+
 namespace {
 
 template <class Real>

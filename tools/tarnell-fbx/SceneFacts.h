@@ -14,6 +14,8 @@ namespace tool {
 
 /// At most ten significant digits, none of them useless.
 std::string numberText(double value);
+/// "23.976 frames per second", to four decimals.
+std::string rateText(double framesPerSecond);
 /// The fewest digits that read back as the same number.
 std::string exactText(double value);
 std::string exactText(float value);

@@ -26,8 +26,9 @@ public:
     [[nodiscard]] FbxScene& scene() const { return *mScene; }
     [[nodiscard]] FbxImporter& importer() const { return *mImporter; }
     [[nodiscard]] FbxTime::EMode timeMode() const { return mScene->GetGlobalSettings().GetTimeMode(); }
-    /// Frames per second; also where the file has a rate of its own.
-    [[nodiscard]] double frameRate() const { return FbxTime::GetFrameRate(timeMode()); }
+    /// Frames per second; also where the file has a rate of its own. That of television is exact: 24000/1001 where the
+    /// application says 23.976.
+    [[nodiscard]] double frameRate() const;
 
     /// Whether the file names its objects by numbers, as files from 7.0 on do.
     [[nodiscard]] bool hasIds() const { return mImporter->GetFileHeaderInfo()->mFileVersion >= 7000; }

@@ -28,23 +28,9 @@ Span spanOfKeys(FbxScene& scene, FbxAnimStack& take) {
 
 } // namespace
 
-double exactFrameRate(FbxScene& scene) {
-    const FbxGlobalSettings& settings = scene.GetGlobalSettings();
-    const FbxTime::EMode mode = settings.GetTimeMode();
-    if (mode == FbxTime::eCustom) {
-        const double rate = settings.GetCustomFrameRate();
-        return std::isfinite(rate) && rate > 0.0 ? rate : FbxTime::GetFrameRate(mode);
-    }
-    // Those of television are a thousandth below a whole number, and rounded to a few decimals.
-    const double rate = FbxTime::GetFrameRate(mode);
-    const double television = std::ceil(rate) * 1000.0 / 1001.0;
-    constexpr double kRounding = 2e-4;
-    return std::abs(rate - television) < kRounding ? television : rate;
-}
-
 TakeFacts takeFacts(const SceneFile& file, FbxAnimStack* take) {
     TakeFacts facts;
-    facts.frameRate = exactFrameRate(file.scene());
+    facts.frameRate = file.frameRate();
     if (!take)
         return facts;
     facts.exists = true;

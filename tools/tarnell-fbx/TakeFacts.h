@@ -21,9 +21,6 @@ struct TakeFacts {
     std::optional<std::pair<double, double>> span, keys;
 };
 
-/// The file's rate, that of television exactly: 24000/1001 where the application says 23.976.
-double exactFrameRate(FbxScene& scene);
-
 TakeFacts takeFacts(const SceneFile& file, FbxAnimStack* take);
 
 } // namespace tool

@@ -90,7 +90,7 @@ std::string remarks(const NodeFacts& facts) {
     if (facts.instance)
         add("instance");
     if (facts.rotationOrder != std::string("XYZ"))
-        add(std::string("turns ") + facts.rotationOrder);
+        add(std::string("rotation order ") + facts.rotationOrder);
     if (!facts.target.empty())
         add("aims at " + inQuotes(facts.target));
     for (const std::string& deformer : facts.deformers)
