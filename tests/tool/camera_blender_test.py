@@ -19,19 +19,19 @@ def y_up(vector):
 
 
 class CamerasOfBlender(unittest.TestCase):
-    def close(self, actual, wanted, tolerance):
+    def close(self, actual, wanted, tolerance, slack=0.0):
         self.assertEqual(len(actual), len(wanted))
         for a, w in zip(actual, wanted):
-            self.assertLessEqual(abs(a - w), tolerance * max(1, abs(w)), (actual, wanted))
+            self.assertLessEqual(abs(a - w), tolerance * max(1, abs(w)) + slack, (actual, wanted))
 
     def check_frame(self, said, wanted, off):
         """`off`: how much of a frame Blender's keys lie beside whole frames."""
         self.assertEqual(said["frame"], wanted["frame"])
-        self.close(said["position"], [100 * each for each in y_up(wanted["place"])], 2e-6 + 0.25 * off)
+        self.close(said["position"], [100 * each for each in y_up(wanted["place"])], 2e-6, 25 * off)
         self.close(said["direction"], y_up(wanted["looks"]), 2e-6)
         if "lens" in wanted:
-            self.close([said["focalLength"]], [wanted["lens"]], 1e-6 + 0.5 * off)
-            self.close(said["pictureFov"], wanted["angles"], 5e-6 + 0.5 * off)
+            self.close([said["focalLength"]], [wanted["lens"]], 1e-6, 12.5 * off)
+            self.close(said["pictureFov"], wanted["angles"], 5e-6, 18 * off)
             self.close([each * INCH for each in said["filmOffset"]], wanted["shift"], 1e-5)
 
     def test_are_what_blender_shows(self):
@@ -50,7 +50,7 @@ class CamerasOfBlender(unittest.TestCase):
                 self.close(camera["at"]["planes"], [100 * each for each in wanted["clip"]], 1e-6)
                 self.assertEqual(len(camera["frames"]), len(wanted["frames"]))
                 # At 59.94 Blender divides by a float, 1.001, and its keys come late: 0.00005 frames after 1001 frames.
-                # In a frame nothing here changes by more than a half, and places by a quarter.
+                # From frame to frame that camera moves by 25 cm, its lens changes by 12.5 mm, and its angles by 17 degrees.
                 off = 1001 * abs(wanted["rate"] / page["frameRate"] - 1) * 1.01
                 for said, frame in zip(camera["frames"], wanted["frames"]):
                     self.check_frame(said, frame, off)
