@@ -33,13 +33,11 @@ EXCEPTIONS = {
     "library": (),
     "platform": (
         (r"fbxsdk::FbxProperty::(readValue|writeValue|evaluate)", "called by Get, Set and EvaluateValue, templates"),
-        (r"fbxsdk::detail::(PlainStorage|StoredItems)(::.*)?", "called by FbxPlainArray, a template"),
+        (r"fbxsdk::detail::(PlainStorage|StoredItems|ItemSource)(::.*)?", "called by FbxPlainArray, a template"),
         (r"fbxsdk::detail::throwMissing(Direct|Index)Array", "called by FbxLayerElementTemplate, a template"),
         (r"fbxsdk::FbxLayerElementTemplate::.*", "instances of a template"),
         (r"fbxsdk::Fbx(Layer::set|NurbsSurfaceBase::(knots|multiplicity)|(Cluster|LayerContainer)::loadSource)",
          "called by public functions that are defined in the headers"),
-        (r"fbxsdk::Fbx(Mesh::(readSource|dropEdges)|Cluster::connectionChanged|LayerContainer::detachSource)",
-         "private or protected, and not marked yet"),
     ),
 }
 

@@ -65,7 +65,7 @@ public:
     void setSource(std::unique_ptr<detail::GeometrySource> pSource);
 
 protected:
-    void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
+    FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
     void ensureLoaded() const {

@@ -522,7 +522,7 @@ protected:
             loadSource();
     }
     /// What follows changes the object: it is read if it can be, and the file is done with.
-    void detachSource();
+    FBXSDK_LOCAL void detachSource();
     /// Fills the object from the file. False when that is not possible yet; the next access tries again.
     virtual bool readSource(const detail::GeometrySource& pSource) = 0;
 

@@ -83,14 +83,14 @@ public:
     [[nodiscard]] detail::PlainArray<int>& edges();
 
 protected:
-    bool readSource(const detail::GeometrySource& pSource) override;
+    FBXSDK_LOCAL bool readSource(const detail::GeometrySource& pSource) override;
 
 private:
     [[nodiscard]] int polygonEnd(int pPolygonIndex) const {
         const int next = pPolygonIndex + 1;
         return next < mPolygonStarts.count() ? mPolygonStarts[next] : mPolygonVertices.count();
     }
-    void dropEdges();
+    FBXSDK_LOCAL void dropEdges();
     /// The corner's place in the polygon vertex array; -1 out of range.
     [[nodiscard]] int cornerOf(int pPolygonIndex, int pPositionInPolygon) const {
         const bool inRange = pPositionInPolygon >= 0 && pPositionInPolygon < GetPolygonSize(pPolygonIndex);
