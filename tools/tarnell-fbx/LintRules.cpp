@@ -18,7 +18,7 @@ constexpr Severity kNote = Severity::note, kWarning = Severity::warning, kError 
 const std::vector<LintRule> kRules = {
     // The file.
     {"not-readable", kError, "The library cannot hand out faithful values of this file, so that no host gets them.",
-     "Mend what the sentence says; often a key or a span lies absurdly far out.", notReadable},
+     "Correct what the message names; often a key or a span is absurdly far out.", notReadable},
     {"repaired", kWarning,
      "The file breaks a rule of the format; other readers may repair it differently, or refuse it.",
      "Save it again in the application it comes from, or with tarnell-fbx convert.", repaired},
@@ -39,7 +39,7 @@ const std::vector<LintRule> kRules = {
      "Left-handed scenes are mirrored by some readers and only turned by others, us among them.",
      "Save the file with right-handed axes.", leftHanded},
     {"not-finite", kError, "NaN and infinities spread: one such number makes whatever is computed with it one, too.",
-     "Set the value or key anew in the application the file comes from.", notFinite},
+     "Set the value or key again in the application the file comes from.", notFinite},
     // Time.
     {"rate-unstated", kWarning,
      "The file does not say how many frames a second has: each program takes its own default, and keys fall between "
@@ -83,7 +83,7 @@ const std::vector<LintRule> kRules = {
      "Look at the picture after reading; the shift is the offset by the film width.", filmOffset},
     {"clip-planes", kError, "The near plane is not before the far one, or not before the camera: nothing is seen.",
      "Set the near plane above zero and the far plane beyond it.", clipPlanes},
-    {"clip-planes-far-apart", kNote, "With planes this far apart a depth buffer of floats tells no distances any more.",
+    {"clip-planes-far-apart", kNote, "With planes this far apart a depth buffer of floats cannot resolve distances.",
      "Move the near plane away from the camera.", clipPlanesFarApart},
     {"camera-scale", kWarning,
      "An uneven or negative scale means nothing to a lens, but mirrors or bends the view where a program inverts the "
@@ -107,19 +107,19 @@ const std::vector<LintRule> kRules = {
     {"mesh-at-origin", kWarning,
      "Compatible reading takes the matrix of a node at the origin apart in another order, and bakes its mesh turned "
      "otherwise.",
-     "Read faithfully (kFbxFidelityFaithful, dump --faithful), or move the mesh by a hair.", meshAtOrigin},
-    {"zero-scale", kError, "A scale of zero cannot be undone: what hangs below has no place of its own.",
+     "Read faithfully (kFbxFidelityFaithful, dump --faithful), or move the mesh by a tiny distance.", meshAtOrigin},
+    {"zero-scale", kError, "A scale of zero has no inverse: objects below the node lose their own placement.",
      "Hide the node by its visibility.", zeroScale},
     {"mirrored-node", kNote, "A mirrored mesh turns inside out in programs that do not turn its polygons round.",
      "Freeze the negative scale, with normals reversed.", mirroredNode},
-    {"sheared-node", kWarning, "Position, rotation and scale cannot say a shear: many programs lose it.",
+    {"sheared-node", kWarning, "Position, rotation and scale cannot express a shear: many programs lose it.",
      "Freeze the scale of the groups above.", shearedNode},
     {"inherited-scale", kWarning, "How the parent's scale is inherited is a setting that most programs do not read.",
      "Freeze the parent's scale.", inheritedScale},
     // Names and structure.
-    {"duplicate-names", kWarning, "Hosts find nodes by name: the first one answers for all.",
+    {"duplicate-names", kWarning, "Hosts find nodes by name, and always find the first one.",
      "Give each node a name of its own.", duplicateNames},
-    {"unnamed-nodes", kNote, "A node without a name cannot be asked for.", "Name it.", unnamedNodes},
+    {"unnamed-nodes", kNote, "A node without a name cannot be found by name.", "Name it.", unnamedNodes},
     {"odd-names", kWarning, "Control characters and broken UTF-8 in names get lost or stop other readers.",
      "Rename the node.", oddNames},
     {"constraints", kWarning, "Constraints are not evaluated: what they drive reads as it was keyed or left.",
@@ -129,7 +129,7 @@ const std::vector<LintRule> kRules = {
      "Remove the curve from the copy for three.js.", curveThatStopsThreeJs},
     // Meshes.
     {"polygons-out-of-range", kError,
-     "Polygons name points that there are not: readers drop them, or the mesh, or crash.",
+     "Polygons refer to points that do not exist: readers drop them, or the mesh, or crash.",
      "Clean the mesh up and save again.", polygonsOutOfRange},
     {"small-polygons", kNote, "Polygons of one or two corners have no area and no normal.", "Clean the mesh up.",
      smallPolygons},
@@ -142,8 +142,9 @@ const std::vector<LintRule> kRules = {
     {"cache-foreign-path", kWarning,
      "The path of the point cache is that of another machine; programs that go by it miss it.",
      "Keep the cache in the folder beside the FBX file, with a relative path.", cacheForeignPath},
-    {"cache-unusable", kError, "The mesh shows undeformed: its point cache does not fit it, or is broken or off.",
-     "Write the cache anew from this mesh; tarnell-fbx cache --verify says where it breaks.", cacheUnusable},
+    {"cache-unusable", kError,
+     "The mesh shows undeformed: its point cache does not fit it, is corrupt, or is switched off.",
+     "Write the cache again from this mesh; tarnell-fbx cache --verify says where it breaks.", cacheUnusable},
     {"cache-range", kWarning, "Outside of the cache's samples the mesh stands still while the rest moves.",
      "Write the cache over the whole take.", cacheRange},
     {"cache-rate", kWarning, "Cache and file have different rates: samples fall between frames.",

@@ -91,8 +91,8 @@ std::pair<CLI::App*, Options*> addCommand(CLI::App& app, std::function<int()>& c
 
 void addTree(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] = addCommand<TreeOptions>(app, chosen, "tree",
-                                                      "Show the nodes as they hang below each "
-                                                      "other",
+                                                      "Show the hierarchy of the nodes, and what "
+                                                      "is attached to each",
                                                       tree);
     addFiles(*command, *options, "FBX files, or patterns of names");
     addCount(*command, "--depth", options->depth, 1, "Only so many levels");
