@@ -3,7 +3,8 @@
 //
 // Writes the files that the peers open, and beside them what a peer must find in each: worked out here from the values
 // that went in, without the library.
-//   interop_samples FOLDER
+//   interop_samples FOLDER compatible|faithful
+// Faithful files have meshes with a transform of their own, too, which others leave out.
 #include <Fbx.h>
 #include <TnFbxCamera.h>
 #include <TnFbxError.h>
@@ -130,7 +131,10 @@ void addLight(Sample& sample, TnFbxLight& light, const char* name, TnFbxLight::E
               const Triple& colour, float intensity) {
     light.setName(name);
     light.setLightType(type);
-    const Path position = [type](float k) { return Triple{-4.0F, 6.0F + 0.25F * k, 3.0F * static_cast<float>(type)}; };
+    // Along all axes: three.js puts spot and directional lights elsewhere along those without keys.
+    const Path position = [type](float k) {
+        return Triple{-4.0F - 0.125F * k, 6.0F + 0.25F * k, 3.0F * static_cast<float>(type) + 0.5F * k};
+    };
     const Path rotation = [](float k) { return Triple{-45.0F, 15.0F - 2.0F * k, 10.0F}; };
     animate(light, Channel::kFbxTransformPositionX, position);
     animate(light, Channel::kFbxTransformRotationX, rotation);
@@ -215,7 +219,45 @@ void addBox(Sample& sample, TnFbxMesh& mesh, const char* name, int sets) {
     sample.expected["objects"].push_back(object);
 }
 
-Sample makeSample() {
+/// Lets a mesh move, turn and be as large as it is, and says where its points are then.
+void place(Sample& sample, TnFbxMesh& mesh, const Path& position, const Path& rotation, const Triple& scale) {
+    animate(mesh, Channel::kFbxTransformPositionX, position);
+    animate(mesh, Channel::kFbxTransformRotationX, rotation);
+    mesh.setTransformRotationOrder(TnFbxTransform::kFbxRotationOrderYZX);
+    for (int axis = 0; axis < 3; ++axis)
+        mesh.setTransformValue(static_cast<Channel>(Channel::kFbxTransformScaleX + axis),
+                               scale[static_cast<std::size_t>(axis)]);
+    json& object = sample.expected["objects"].back();
+    const json points = object["points"];
+    for (int frame = kFirst; frame <= kLast; ++frame) {
+        const auto step = static_cast<float>(frame - kFirst);
+        const Triple shift = position(step);
+        json placed = json::array();
+        for (const json& point : points) {
+            Vector at{};
+            for (std::size_t axis = 0; axis < 3; ++axis)
+                at[axis] = point[axis].get<double>() * static_cast<double>(scale[axis]);
+            at = rotated(at, rotation(step), kOrderYzx);
+            for (std::size_t axis = 0; axis < 3; ++axis)
+                at[axis] += static_cast<double>(shift[axis]);
+            placed.push_back(at);
+        }
+        object["placed"][std::to_string(frame)] = placed;
+    }
+    object["points"] = object["placed"][std::to_string(kFirst)];
+}
+
+void addPlacedBoxes(Sample& sample) {
+    const Path position = [](float k) { return Triple{4.0F + 0.75F * k, -2.0F, 1.0F - k}; };
+    const Path rotation = [](float k) { return Triple{20.0F, 35.0F - 6.0F * k, 10.0F + 3.0F * k}; };
+    sample.meshes.resize(4);
+    addBox(sample, sample.meshes[2], "placed", 1);
+    place(sample, sample.meshes[2], position, rotation, {2.0F, 0.5F, 1.25F});
+    addBox(sample, sample.meshes[3], "mirrored", 1);
+    place(sample, sample.meshes[3], position, rotation, {-1.0F, 1.0F, 1.5F});
+}
+
+Sample makeSample(bool faithful) {
     Sample sample;
     addCamera(sample);
     addLight(sample, sample.lights[0], "bulb", TnFbxLight::kFbxLightPoint, "point", {1.0F, 0.5F, 0.25F}, 1.0F);
@@ -225,6 +267,8 @@ Sample makeSample() {
     addNulls(sample);
     addBox(sample, sample.meshes[0], "box", 1);
     addBox(sample, sample.meshes[1], "waving", kLast - kFirst + 1);
+    if (faithful)
+        addPlacedBoxes(sample);
     return sample;
 }
 
@@ -236,6 +280,8 @@ std::vector<Object*> pointers(std::vector<Object>& objects) {
     return result;
 }
 
+const char* stackName(bool faithful) { return faithful ? "shot 010" : "Take 001"; }
+
 struct Layout {
     const char* year;
     TnFbxWriteInfo::eCompatibilityVersion version;
@@ -246,11 +292,15 @@ constexpr Layout kLayouts[] = {
     {"2012", TnFbxWriteInfo::kFbxVersion2012, 7200}, {"2013", TnFbxWriteInfo::kFbxVersion2013, 7300},
     {"2014", TnFbxWriteInfo::kFbxVersion2014, 7400}, {"2016", TnFbxWriteInfo::kFbxVersion2016, 7500}};
 
-bool write(const std::string& folder, const Layout& layout, bool ascii, Sample& sample, json& files) {
+bool write(const std::string& folder, const Layout& layout, bool ascii, bool faithful, Sample& sample, json& files) {
     const std::string name = std::string("sample_") + layout.year + (ascii ? "_ascii" : "_binary");
     TnFbxWriteInfo info;
     info.setFileName(folder + "/" + name + ".fbx");
-    info.setAnimationStackName("Take 001");
+    info.setAnimationStackName(stackName(faithful));
+    if (faithful) {
+        info.setFidelity(kFbxFidelityFaithful);
+        info.setComputeCameraRotation(false); // the rotations say where the camera looks
+    }
     info.setFileFormat(ascii);
     info.setFPS(kRate);
     info.setStartFrame(kFirst);
@@ -271,20 +321,23 @@ bool write(const std::string& folder, const Layout& layout, bool ascii, Sample& 
 } // namespace
 
 int main(int argumentCount, char** arguments) {
-    if (argumentCount != 2) {
-        std::fprintf(stderr, "usage: interop_samples FOLDER\n");
+    const std::string fidelity = argumentCount == 3 ? arguments[2] : "";
+    if (fidelity != "compatible" && fidelity != "faithful") {
+        std::fprintf(stderr, "usage: interop_samples FOLDER compatible|faithful\n");
         return 2;
     }
     const std::string folder = arguments[1];
-    Sample sample = makeSample();
+    const bool faithful = fidelity == "faithful";
+    Sample sample = makeSample(faithful);
     json files = json::array();
     for (const Layout& layout : kLayouts)
         for (const bool ascii : {false, true})
-            if (!write(folder, layout, ascii, sample, files))
+            if (!write(folder, layout, ascii, faithful, sample, files))
                 return 1;
     sample.expected["files"] = files;
     sample.expected["frames"] = {kFirst, kLast};
     sample.expected["rate"] = kRate;
+    sample.expected["stacks"] = {stackName(faithful)};
     std::ofstream(folder + "/expected.json") << sample.expected.dump(1) << '\n';
     return 0;
 }

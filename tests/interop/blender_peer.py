@@ -65,6 +65,7 @@ def describe(item):
         seen["polygons"] = len(mesh.polygons)
         seen["polygonVertices"] = len(mesh.loops)
         seen["uvs"] = [list(uv.uv) for uv in mesh.uv_layers[0].data] if mesh.uv_layers else []
+        seen["placed"] = {}
     else:
         seen["positions"] = {}
         seen["directions"] = {}
@@ -81,7 +82,8 @@ def look(path, caches, frames):
         scene.frame_set(frame)
         for item in scene.objects:
             seen = objects[item.name]
-            if "positions" not in seen:
+            if item.type == "MESH":
+                seen["placed"][str(frame)] = [position(item.matrix_world @ v.co) for v in item.data.vertices]
                 continue
             seen["positions"][str(frame)] = position(item.matrix_world.translation)
             direction = item.matrix_world.to_3x3() @ Vector((0, 0, -1))

@@ -3,8 +3,8 @@
 # Copyright (c) Tarnell FBX contributors
 #
 # Lets another program open files that we wrote, and compares what it sees with what went in.
-#   interop.py PEER SAMPLES_PROGRAM FOLDER COMMAND…
-# The command gets two more arguments, the folder of the samples and one for its findings, a JSON object per file.
+#   interop.py PEER compatible|faithful SAMPLES_PROGRAM FOLDER COMMAND…
+# The files are written in that way. The command gets two more arguments, the folder of the samples and one for its findings, a JSON object per file.
 # A key that a peer does not report is one that it cannot see; PEERS says what each one must report.
 import json
 import math
@@ -32,14 +32,21 @@ PEERS = {
         "opens": lambda entry: entry["version"] >= 7100 and not entry["ascii"],
         "reports": {"camera": BACKWARD + ["focalLengths", "filmWidth", "filmHeight", "filmOffset"],
                     "light": BACKWARD + ["type", "colour", "coneAngle"], "null": ANIMATED,
-                    "mesh": ["points", "polygons", "polygonVertices", "uvs"]},
+                    "mesh": ["points", "placed", "polygons", "polygonVertices", "uvs"]},
         "caches": ["cached"],
     },
     "three": {
         "tolerance": TOLERANCE_OF_TIMES,
         "opens": lambda entry: entry["version"] >= 7000,
         "reports": {"camera": ANIMATED, "light": ANIMATED + ["type", "colour", "intensity"], "null": ANIMATED,
-                    "mesh": ["points"]},
+                    "mesh": ["points", "placed"]},
+    },
+    "ufbx": {
+        "opens": lambda entry: True,
+        "reports": {"camera": ANIMATED + ["focalLengths", "filmWidth", "filmHeight", "filmOffset"],
+                    "light": ANIMATED + ["type", "colour", "intensity", "coneAngle"], "null": ANIMATED,
+                    "mesh": ["points", "placed", "polygons", "polygonVertices", "uvs", "cached"]},
+        "scene": ["stacks", "rate"],
     },
 }
 
@@ -69,7 +76,15 @@ def same_points(expected, seen, tolerance):
     return same(ordered(expected), ordered(seen or []), tolerance)
 
 
-COMPARISONS = {"points": same_points, "axes": same_axes}
+def near_points(expected, seen, tolerance):
+    """The same points in any order, where they are at every frame."""
+    def near(points, others):
+        return all(any(same(point, other, tolerance) for other in others) for point in points)
+    return isinstance(seen, dict) and all(frame in seen and near(points, seen[frame]) and near(seen[frame], points)
+                                          for frame, points in expected.items())
+
+
+COMPARISONS = {"placed": near_points, "points": same_points, "axes": same_axes}
 
 
 def first_difference(expected, seen):
@@ -102,7 +117,12 @@ def differences(expected, seen, keys, tolerance):
     return found
 
 
-def check(peer, samples, findings):
+def is_view(name):
+    """Whether an object is one of the views that compatible files of 6.1 list."""
+    return name == "Camera Switcher" or name.startswith("Producer ")
+
+
+def check(peer, fidelity, samples, findings):
     with open(os.path.join(samples, "expected.json"), encoding="utf-8") as stream:
         expected = json.load(stream)
     rules = PEERS[peer]
@@ -113,9 +133,15 @@ def check(peer, samples, findings):
             wrong.append(f"{entry['file']}: was not opened")
             continue
         with open(path, encoding="utf-8") as stream:
-            seen = {item["name"]: item for item in json.load(stream)["objects"]}
+            scene = json.load(stream)
+        seen = {item["name"]: item for item in scene["objects"]}
+        for key in rules.get("scene", []):
+            compared += 1
+            if not same(expected[key], scene.get(key)):
+                wrong.append(f"{entry['file']}: {key}: {scene.get(key)} instead of {expected[key]}")
         names = {item["name"] for item in expected["objects"]}
-        wrong += [f"{entry['file']}: there is an object too many, {name}" for name in sorted(set(seen) - names)]
+        wrong += [f"{entry['file']}: there is an object too many, {name}" for name in sorted(set(seen) - names)
+                  if fidelity == "faithful" or not is_view(name)]
         for item in expected["objects"]:
             keys = rules["reports"][item["kind"]] + rules.get("caches", [])
             compared += len([key for key in keys if key in item or key in ("axes", "radiance")])
@@ -126,13 +152,13 @@ def check(peer, samples, findings):
 
 
 def main():
-    peer, program, folder, *command = sys.argv[1:]
+    peer, fidelity, program, folder, *command = sys.argv[1:]
     samples, findings = os.path.join(folder, "samples"), os.path.join(folder, "findings")
     shutil.rmtree(folder, ignore_errors=True)
     os.makedirs(samples)
-    subprocess.run([program, samples], check=True)
+    subprocess.run([program, samples, fidelity], check=True)
     done = subprocess.run(command + [samples, findings], stdout=subprocess.PIPE, stderr=subprocess.STDOUT, text=True)
-    compared, wrong = check(peer, samples, findings)
+    compared, wrong = check(peer, fidelity, samples, findings)
     if done.returncode != 0:
         wrong.append(f"{peer} failed:\n{done.stdout}")
     print("\n".join(wrong))

@@ -38,6 +38,7 @@ function describe(object) {
   const seen = { name: object.userData.originalName ?? object.name, kind: kindOf(object) };
   if (seen.kind === 'mesh') {
     seen.points = points(object);
+    seen.placed = {};
     return seen;
   }
   seen.positions = {};
@@ -71,7 +72,10 @@ function look(path) {
     mixer.setTime(frame / expected.rate);
     group.updateMatrixWorld(true);
     for (const [object, seen] of objects) {
-      if (!seen.positions) continue;
+      if (seen.placed) {
+        seen.placed[frame] = points(object);
+        continue;
+      }
       seen.positions[frame] = new Vector3().setFromMatrixPosition(object.matrixWorld).toArray();
       seen.directions[frame] = FORWARD[seen.kind].clone().transformDirection(object.matrixWorld).toArray();
     }
