@@ -397,6 +397,91 @@ class Convert(unittest.TestCase):
                 for name, channel in a["transform"].items():
                     self.assertSameChannel(channel, b["transform"][name], f"{a['name']} {name}")
 
+    def skewed(self):
+        """A mesh that its parents' turns and unequal scales skew."""
+        place = 'P: "Lcl Rotation", "Lcl Rotation", "", "A",0,0,30\n\t\t\tP: "Lcl Scaling", "Lcl Scaling", "", "A",%s\n'
+        models = "".join(f'Model: {number}, "Model::{name}", "{kind}" {{\nProperties70: {{\n{place % scale}}}\n}}\n'
+                         for number, name, kind, scale in ((1, "upper", "Null", "1,3,1"), (2, "lower", "Mesh", "2,1,1")))
+        path = os.path.join(self.folder.name, "skewed.fbx")
+        with open(path, "w", encoding="utf-8") as file:
+            file.write("; FBX 7.4.0 project file\nFBXHeaderExtension: {\nFBXVersion: 7400\n}\nObjects: {\n" + models +
+                       'Geometry: 3, "Geometry::", "Mesh" {\nVertices: *9 {\na: 0,0,0,1,0,0,0,1,0\n}\n'
+                       "PolygonVertexIndex: *3 {\na: 0,1,-3\n}\n}\n}\n"
+                       'Connections: {\nC: "OO",1,0\nC: "OO",2,1\nC: "OO",3,2\n}\n')
+        return path
+
+    def test_a_copy_of_a_skewed_object_does_not_grow(self):
+        source = self.skewed()
+        before = self.faithful(source, "--kind", "meshes")["meshes"][0]
+        for version in ("2016", "2010"):
+            file = source
+            for copy in range(3):
+                self.out = os.path.join(self.folder.name, f"copy{version}{copy}.fbx")
+                complaint = self.convert("--version", version, source=file).stderr
+                self.assertEqual("below others: 1\n" in complaint, copy == 0, complaint)
+                seen = self.faithful(self.out)
+                self.assertEqual([item["name"] for item in seen["transforms"]], ["lower skew", "lower", "upper"]
+                                 if seen["transforms"][0]["name"] != "upper" else ["upper", "lower skew", "lower"])
+                for a, b in zip(before["controlPoints"], seen["meshes"][0]["controlPoints"]):
+                    for x, y in zip(a, b):
+                        self.assertAlmostEqual(x, y, places=4)
+                file = self.out
+
+    def test_the_stack_that_is_named_is_written(self):
+        source = os.path.join(SDK_DATA, "two_stacks_7400_ascii.fbx")
+        stacks = dump(source)["stacks"]
+        self.assertEqual(len(stacks), 2)
+        for name in stacks:
+            self.convert("--force", "--stack", name, source=source)
+            self.assertEqual(dump(self.out)["stacks"], [name])
+            before = self.faithful(source, "--stack", name)
+            after = self.faithful(self.out)
+            self.assertEqual(before["range"], after["range"])
+            for item in before["transforms"]:
+                self.assertSameTransform(item, named(after["transforms"], item["name"]))
+
+    def test_an_unknown_stack_is_refused_with_those_there_are(self):
+        result = run("convert", "--stack", "nosuch", SHOT, self.out)
+        self.assertEqual(result.returncode, 1)
+        self.assertIn('there is no animation stack "nosuch"; the file has "', result.stderr)
+        self.assertFalse(os.path.exists(self.out))
+
+    def test_losses_are_those_of_the_kinds_that_are_asked_for(self):
+        self.assertIn("not written: materials: ", self.convert(source=SKINNED).stderr)
+        for kinds in ("cameras", "nulls", "transforms", "lights"):
+            complaint = self.convert("--force", "--kind", kinds, source=SKINNED).stderr
+            for what in ("materials", "skins", "textures"):
+                self.assertNotIn(what, complaint, kinds)
+        self.assertNotIn("gate fits", self.convert("--force", "--kind", "nulls").stderr)
+
+    def test_extras_of_lights_are_counted(self):
+        source = os.path.join(self.folder.name, "light.fbx")
+        with open(source, "w", encoding="utf-8") as file:
+            file.write("; FBX 7.4.0 project file\nFBXHeaderExtension: {\nFBXVersion: 7400\n}\nObjects: {\n"
+                       'Model: 1, "Model::lamp", "Light" {\n}\nModel: 3, "Model::plain", "Light" {\n}\n'
+                       'NodeAttribute: 4, "NodeAttribute::", "Light" {\n}\n'
+                       'NodeAttribute: 2, "NodeAttribute::", "Light" {\nProperties70: {\n'
+                       'P: "CastShadows", "bool", "", "",1\nP: "EnableBarnDoor", "Bool", "", "A",1\n'
+                       'P: "InnerAngle", "Number", "", "A",12\nP: "CastLight", "bool", "", "",0\n}\n}\n}\n'
+                       'Connections: {\nC: "OO",1,0\nC: "OO",2,1\nC: "OO",3,0\nC: "OO",4,3\n}\n')
+        complaint = self.convert(source=source).stderr
+        for what in ("not written: shadows of lights: 1", "not written: barn doors of lights: 1",
+                     "not written: inner cones of lights: 1", "written as switched on: lights that cast no light: 1"):
+            self.assertIn(what + "\n", complaint)
+        self.assertEqual(self.convert("--force", "--kind", "cameras", source=source).stderr, "")
+
+    def test_what_meshes_lose_is_counted(self):
+        source = self.source("mesh_7400_ascii.fbx",
+                             ("\t\tGeometryVersion: 124\n", "\t\tGeometryVersion: 124\n\t\tSmoothness: 3\n"))
+        self.assertIn("not written: subdivision of meshes: 1\n", self.convert(source=source).stderr)
+        instances = os.path.join(self.folder.name, "instances.fbx")
+        with open(self.skewed(), encoding="utf-8") as stream:
+            text = stream.read()
+        with open(instances, "w", encoding="utf-8") as stream:
+            stream.write(text.replace('"Null"', '"Mesh"').replace('C: "OO",3,2\n', 'C: "OO",3,2\nC: "OO",3,1\n'))
+        self.assertIn("written anew for each node: meshes and other attributes that nodes have in common: 1\n",
+                      self.convert("--force", source=instances).stderr)
+
     def test_nothing_is_overwritten_unless_forced(self):
         with open(self.out, "w", encoding="utf-8") as stream:
             stream.write("precious")

@@ -44,6 +44,7 @@ struct ConvertOptions {
     std::vector<std::string> kinds;            ///< empty: all
     std::optional<std::pair<int, int>> frames; ///< points of meshes at every whole frame, as point caches
     std::optional<float> fps;
+    std::string stack; ///< empty: the first one
     PointCache cache = PointCache::maya;
     bool local = false;
     bool force = false;

@@ -46,7 +46,7 @@ struct Objects {
 
 class Convert {
 public:
-    explicit Convert(const ConvertOptions& options) : mOptions(options) {}
+    explicit Convert(const ConvertOptions& options) : mOptions(options), mLosses(options.kinds) {}
 
     /// False with the reason in lastError().
     bool read() {
@@ -54,6 +54,7 @@ public:
         mLosses.addRecords(mOptions.input);
         TnFbxReadInfo info;
         info.setFileName(mOptions.input);
+        info.setAnimationStackName(mOptions.stack);
         info.setGlobalTransform(!mOptions.local);
         info.setTransformPoints(false);
         info.setUseSampleFPS(mOptions.fps.has_value());
@@ -95,10 +96,7 @@ public:
     [[nodiscard]] const std::vector<std::string>& warnings() const { return mWarnings; }
 
 private:
-    [[nodiscard]] bool wants(const char* kind) const {
-        const auto& kinds = mOptions.kinds;
-        return kinds.empty() || std::find(kinds.begin(), kinds.end(), kind) != kinds.end();
-    }
+    [[nodiscard]] bool wants(const char* kind) const { return mLosses.wants(kind); }
 
     [[nodiscard]] bool cachesPoints() const { return mOptions.frames && mOptions.cache != PointCache::none; }
     [[nodiscard]] long long firstFrame() const {
@@ -118,7 +116,7 @@ private:
     bool readNodes() {
         for (const TreeNode& entry : nodesInOrder(*mReader.getScene())) {
             FbxNode& node = *entry.node;
-            if (entry.isDetached || isProducer(node))
+            if (entry.isDetached || isProducer(node) || isSkewHelper(node))
                 continue;
             const FbxNodeAttribute* attribute = node.GetNodeAttribute();
             if (!readNode(node, attribute ? attribute->GetAttributeType() : FbxNodeAttribute::eNull))

@@ -3,12 +3,14 @@
 #include "ConvertLosses.h"
 
 #include <algorithm>
+#include <array>
 #include <memory>
 #include <set>
 #include <string_view>
 
 #include <fbxsdk/extensions/RecordFile.h>
 
+#include "PropertyValues.h"
 #include "SceneQueries.h"
 
 namespace tool {
@@ -24,6 +26,8 @@ int countOf(const FbxScene& scene) {
 /// How many sets of a kind a mesh has beyond the first.
 int further(const FbxMesh& mesh, FbxLayerElement::EType type) { return std::max(mesh.GetLayerCount(type) - 1, 0); }
 
+bool has(const FbxMesh& mesh, FbxLayerElement::EType type) { return mesh.GetLayerCount(type) > 0; }
+
 bool isHidden(FbxNode& node) { return node.Visibility.Get() == 0.0 || isAnimated(node.Visibility); }
 
 bool hasOwnProperties(const FbxObject& object) {
@@ -32,23 +36,104 @@ bool hasOwnProperties(const FbxObject& object) {
                        [](const FbxProperty& property) { return property.GetFlag(FbxPropertyFlags::eUserDefined); });
 }
 
-/// What is counted of the nodes of a scene.
-struct NodeCounts {
-    int parents = 0, hidden = 0, ownProperties = 0;
-    int surfaces = 0, others = 0;
-    int zooms = 0, gateFits = 0, lights = 0;
-    int furtherCaches = 0;
-    int furtherUVs = 0, furtherNormals = 0, furtherColours = 0;
+/// Properties of lights that are written as a new light has them.
+struct LightExtra {
+    const char* what;
+    std::vector<const char*> properties;
+    int count = 0;
+};
 
-    void add(FbxNode& node) {
-        parents += node.GetParent() && node.GetParent()->GetParent() ? 1 : 0;
-        hidden += isHidden(node) ? 1 : 0;
-        ownProperties += hasOwnProperties(node) ? 1 : 0;
-        if (FbxNodeAttribute* attribute = node.GetNodeAttribute())
-            add(*attribute);
+/// Which of them the lights of a scene use.
+class LightExtras {
+public:
+    explicit LightExtras(FbxScene& scene) : mUntouched(FbxLight::Create(scene.GetFbxManager(), "")) {}
+    ~LightExtras() { mUntouched->Destroy(); }
+    LightExtras(const LightExtras&) = delete;
+    LightExtras& operator=(const LightExtras&) = delete;
+
+    void add(const FbxLight& light) {
+        for (LightExtra& extra : mExtras)
+            extra.count += std::any_of(extra.properties.begin(), extra.properties.end(),
+                                       [&](const char* name) { return isChanged(light, name); })
+                               ? 1
+                               : 0;
+        mSwitchedOff += light.CastLight.Get() ? 0 : 1;
+    }
+    void report(Losses& losses) const {
+        for (const LightExtra& extra : mExtras)
+            losses.add(extra.count, extra.what);
+        losses.add(mSwitchedOff, "written as switched on: lights that cast no light");
     }
 
 private:
+    bool isChanged(const FbxLight& light, const char* name) const {
+        const FbxProperty property = light.FindProperty(name);
+        return property.IsValid() &&
+               (valueText(property) != valueText(mUntouched->FindProperty(name)) || isAnimated(property));
+    }
+
+    FbxLight* mUntouched;
+    std::array<LightExtra, 6> mExtras = {
+        {{"not written: shadows of lights", {"CastShadows", "ShadowColor"}},
+         {"not written: barn doors of lights", {"EnableBarnDoor"}},
+         {"not written: inner cones of lights", {"InnerAngle"}},
+         {"not written: ranges of lights", {"EnableNearAttenuation", "EnableFarAttenuation", "DecayStart"}},
+         {"not written: pictures that lights project", {"FileName"}},
+         {"not written: visible cones of lights", {"DrawVolumetricLight", "DrawGroundProjection", "Fog"}}}};
+    int mSwitchedOff = 0;
+};
+
+/// The kind that a node with the attribute is written as, when it is asked for.
+const char* kindOf(Attribute::EType type) {
+    switch (type) {
+    case Attribute::eMesh:
+    case Attribute::eNurbs:
+    case Attribute::ePatch:
+    case Attribute::eNurbsSurface:
+    case Attribute::eTrimNurbsSurface:
+        return "meshes";
+    case Attribute::eCamera:
+    case Attribute::eCameraStereo:
+        return "cameras";
+    case Attribute::eLight:
+        return "lights";
+    case Attribute::eNull:
+        return "nulls";
+    default:
+        return "transforms";
+    }
+}
+
+/// What is counted of the nodes of a scene.
+struct NodeCounts {
+    NodeCounts(FbxScene& scene, const Losses& losses) : extras(scene), asked(losses) {}
+
+    LightExtras extras;
+    int parents = 0, hidden = 0, ownProperties = 0, shared = 0;
+    int surfaces = 0, others = 0;
+    int zooms = 0, gateFits = 0, lights = 0;
+    int furtherCaches = 0;
+    int furtherUVs = 0, furtherNormals = 0, furtherColours = 0, tangents = 0, smoothing = 0, creases = 0;
+
+    void add(FbxNode& node) {
+        FbxNodeAttribute* attribute = node.GetNodeAttribute();
+        const bool isOfKind = asked.wants(kindOf(attribute ? attribute->GetAttributeType() : Attribute::eNull));
+        if (!isOfKind && !asked.wants("transforms"))
+            return;
+        const FbxNode* parent = node.GetParent();
+        parents += parent && parent->GetParent() && !isSkewHelper(*parent) ? 1 : 0;
+        hidden += isHidden(node) ? 1 : 0;
+        ownProperties += hasOwnProperties(node) ? 1 : 0;
+        if (attribute && isOfKind) {
+            shared += seen.insert(attribute).second ? 0 : 1;
+            add(*attribute);
+        }
+    }
+
+private:
+    const Losses& asked;
+    std::set<const FbxNodeAttribute*> seen;
+
     void add(FbxNodeAttribute& attribute) {
         switch (attribute.GetAttributeType()) {
         case Attribute::eMesh:
@@ -60,9 +145,12 @@ private:
             break;
         case Attribute::eLight:
             lights += static_cast<FbxLight&>(attribute).LightType.Get() > FbxLight::eSpot ? 1 : 0;
+            extras.add(static_cast<FbxLight&>(attribute));
             break;
         case Attribute::eNurbs:
         case Attribute::ePatch:
+        case Attribute::eNurbsSurface:
+        case Attribute::eTrimNurbsSurface:
             ++surfaces;
             break;
         case Attribute::eNull:
@@ -83,6 +171,12 @@ private:
         furtherUVs += further(mesh, FbxLayerElement::eUV);
         furtherNormals += further(mesh, FbxLayerElement::eNormal);
         furtherColours += further(mesh, FbxLayerElement::eVertexColor);
+        tangents += has(mesh, FbxLayerElement::eTangent) || has(mesh, FbxLayerElement::eBiNormal) ? 1 : 0;
+        smoothing += has(mesh, FbxLayerElement::eSmoothing) ? 1 : 0;
+        creases += has(mesh, FbxLayerElement::eEdgeCrease) || has(mesh, FbxLayerElement::eVertexCrease) ||
+                           has(mesh, FbxLayerElement::eHole)
+                       ? 1
+                       : 0;
         furtherCaches += std::max(mesh.GetDeformerCount(FbxDeformer::eVertexCache) - 1, 0);
     }
 };
@@ -94,35 +188,59 @@ bool isProducer(FbxScene& scene, const FbxNode& node) {
 
 } // namespace
 
+bool Losses::wants(const char* kind) const {
+    return mKinds.empty() || std::find(mKinds.begin(), mKinds.end(), kind) != mKinds.end();
+}
+
 void Losses::add(int count, const std::string& what) {
     if (count > 0)
         mSentences.push_back(what + ": " + std::to_string(count));
 }
 
 void Losses::addScene(FbxScene& scene) {
-    NodeCounts nodes;
+    NodeCounts nodes(scene, *this);
     for (const TreeNode& entry : nodesInOrder(scene)) {
-        if (entry.node->GetParent() && !isProducer(scene, *entry.node))
+        if (entry.node->GetParent() && !isProducer(scene, *entry.node) && !isSkewHelper(*entry.node))
             nodes.add(*entry.node);
     }
     add(nodes.parents, "written below the root, where they are in the world: objects below others");
-    add(countOf<FbxSurfaceMaterial>(scene), "not written: materials");
-    add(countOf<FbxTexture>(scene), "not written: textures");
-    add(countOf<FbxSkin>(scene), "not written: skins");
-    add(countOf<FbxBlendShape>(scene), "not written: blend shapes");
+    add(nodes.shared, "written anew for each node: meshes and other attributes that nodes have in common");
+    if (wants("meshes")) {
+        add(countOf<FbxSurfaceMaterial>(scene), "not written: materials");
+        add(countOf<FbxTexture>(scene), "not written: textures");
+        add(countOf<FbxSkin>(scene), "not written: skins");
+        add(countOf<FbxBlendShape>(scene), "not written: blend shapes");
+    }
     add(countOf<FbxAnimStack>(scene) - 1, "not written: further animation stacks");
     add(nodes.furtherUVs, "not written: further sets of texture coordinates");
     add(nodes.furtherNormals, "not written: further sets of normals");
     add(nodes.furtherColours, "not written: further sets of colours");
+    add(nodes.tangents, "not written: tangents and binormals of meshes");
+    add(nodes.smoothing, "not written: smoothing of meshes");
+    add(nodes.creases, "not written: creases and holes of meshes");
     add(nodes.furtherCaches, "not written: caches of normals and further ones of meshes");
     add(nodes.zooms, "not written: zooms of orthographic cameras");
     add(nodes.gateFits, "not written: gate fits of cameras");
     add(nodes.lights, "written as point lights: area and volume lights");
+    nodes.extras.report(*this);
     add(nodes.surfaces, "written as meshes: surfaces");
     add(nodes.others, "written as nulls: curves, lines and other attributes");
     add(nodes.hidden, "written as visible: objects that are hidden or whose visibility is animated");
     add(nodes.ownProperties, "not written: properties that users added to objects");
 }
+
+namespace {
+
+/// Whether an object of the file, a geometry or in older files a model, is to be subdivided.
+bool isSubdivided(const extensions::FileRecord& object) {
+    for (auto child = object.firstChild(); child; child = child.nextSibling()) {
+        if (child.name() == "Smoothness" && child.value(0).integer > 0)
+            return true;
+    }
+    return false;
+}
+
+} // namespace
 
 void Losses::addRecords(const std::string& file) {
     struct Kind {
@@ -133,6 +251,7 @@ void Losses::addRecords(const std::string& file) {
     Kind kinds[] = {{"Constraint", "not written: constraints", 0},
                     {"Pose", "not written: poses", 0},
                     {"Character", "not written: characters", 0}};
+    int subdivided = 0;
     FbxStatus status;
     const auto records = extensions::RecordFile::open(file.c_str(), status);
     if (!records)
@@ -142,10 +261,13 @@ void Losses::addRecords(const std::string& file) {
              object = object.nextSibling()) {
             for (Kind& kind : kinds)
                 kind.count += object.name() == kind.record ? 1 : 0;
+            const bool isGeometry = object.name() == "Geometry" || object.name() == "Model";
+            subdivided += isGeometry && wants("meshes") && isSubdivided(object) ? 1 : 0;
         }
     }
     for (const Kind& kind : kinds)
         add(kind.count, kind.what);
+    add(subdivided, "not written: subdivision of meshes");
 }
 
 } // namespace tool

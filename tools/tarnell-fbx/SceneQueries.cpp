@@ -53,6 +53,19 @@ bool isAnimated(const FbxProperty& property) {
     return false;
 }
 
+bool isSkewHelper(const FbxNode& node) {
+    if (node.GetNodeAttribute() || node.GetChildCount() != 1)
+        return false;
+    const FbxNode& skewed = *node.GetChild(0);
+    FbxTransform::EInheritType inheritType = FbxTransform::eInheritRrSs;
+    skewed.GetTransformationInheritType(inheritType);
+    const FbxDouble3 offset = skewed.LclTranslation.Get();
+    const bool isApart = offset[0] != 0.0 || offset[1] != 0.0 || offset[2] != 0.0;
+    const std::string name = std::string(skewed.GetName()) + " skew"; // a number may follow
+    return inheritType == FbxTransform::eInheritRSrs && !isApart && !isAnimated(skewed.LclTranslation) &&
+           std::string(node.GetName()).compare(0, name.size(), name) == 0;
+}
+
 std::vector<FbxProperty> propertiesOf(const FbxObject& object) {
     std::vector<FbxProperty> properties;
     for (FbxProperty each = object.GetFirstProperty(); each.IsValid(); each = object.GetNextProperty(each))

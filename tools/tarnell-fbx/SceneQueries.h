@@ -28,6 +28,9 @@ std::vector<TreeNode> nodesInOrder(FbxScene& scene);
 /// Whether any curve of any take drives the property.
 bool isAnimated(const FbxProperty& property);
 
+/// Whether a faithful write made the node only to skew the one below it, as it does wherever that is written again.
+bool isSkewHelper(const FbxNode& node);
+
 /// The object's properties in their order, those of compounds behind the compound.
 std::vector<FbxProperty> propertiesOf(const FbxObject& object);
 

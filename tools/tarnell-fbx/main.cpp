@@ -115,6 +115,7 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
             },
             "Comma list of cameras, lights, nulls, transforms, meshes (default: all)")
         ->type_name("LIST");
+    convert->add_option("--stack", options.stack, "The animation stack to write (default: the first one)");
     tool::addFrames(*convert, options.frames, "Points of meshes at every whole frame of A:B, as point caches");
     convert->add_option("--fps", options.fps, "Sample and write at this many frames per second")
         ->check(refuseUnlessFinite)
