@@ -262,6 +262,18 @@ TEST(Lists, FillTheArrayInTheOrderOfTheWalk) {
     EXPECT_TRUE(lastError().empty());
 }
 
+TEST(Lists, NeverReadTheRoot) {
+    TestScene scene;
+    scene.scene->GetRootNode()->SetNodeAttribute(fbxsdk::FbxLight::Create(scene.scene, "light"));
+    TnFbxReadInfo info = test::readAll();
+    TnFbxLight light;
+    light.setName("untouched");
+
+    EXPECT_TRUE(scene.sdk.getLights(info, &light, 1));
+
+    EXPECT_EQ(light.getName(), "untouched");
+}
+
 TEST(Lists, ReadEveryKindFromItsNodes) {
     TestScene scene;
     buildTree(scene);

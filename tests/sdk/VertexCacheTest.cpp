@@ -112,6 +112,28 @@ TEST_P(VertexCache, IsReadThroughTheListOfMeshes) {
     EXPECT_FALSE(scene.cache->IsOpen());
 }
 
+TEST_P(VertexCache, ThatGivesNoPointsLeavesThePolygonsOfItsMesh) {
+    CacheScene scene(GetParam());
+    const char* data = GetParam() == FbxCache::eMayaCache ? "points.mc" : "points.pc2";
+    const std::string whole = scene.folder.read(data);
+    scene.folder.write(data, whole.substr(0, whole.size() - 1));
+    TnFbxReadInfo info = test::readAll();
+    info.setTransformPoints(false);
+    info.setFrame(3.0f);
+    TnFbxMesh mesh;
+
+    EXPECT_TRUE(scene.sdk.getMeshes(info, &mesh, 1));
+
+    const fbxsdk::FbxMesh& source = *scene.node->GetMesh();
+    ASSERT_GT(source.GetPolygonCount(), 0);
+    EXPECT_EQ(mesh.getNumberOfPolygons(), source.GetPolygonCount());
+    EXPECT_EQ(mesh.getNumberOfPolygonVertices(), source.GetPolygonVertexCount());
+    EXPECT_EQ(mesh.getPolygonVertexSize(0), source.GetPolygonSize(0));
+    float x = 0.0f, y = 0.0f, z = -1.0f;
+    EXPECT_TRUE(mesh.getControlPoint(1, x, y, z));
+    EXPECT_EQ(z, 0.0f) << "not moved by the cache";
+}
+
 /// Moves every point by 100 along Y: half of the difference to a target, in percent.
 void addShape(TestScene& scene, fbxsdk::FbxNode& node) {
     fbxsdk::FbxGeometry& mesh = *node.GetGeometry();
