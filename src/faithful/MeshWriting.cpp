@@ -163,6 +163,23 @@ void addGeometry(WrittenScene& scene, const TnFbxMesh& mesh, fbxsdk::FbxNode& no
     addCache(scene, mesh, node);
 }
 
+/// Meshes that share all their arrays are one, on several nodes; each point cache has a mesh of its own. `mesh` must
+/// live as long as the scene.
+void addShared(WrittenScene& scene, const TnFbxMesh& mesh, fbxsdk::FbxNode& node) {
+    if (mesh.getNumberOfControlPointSets() > 1) {
+        addGeometry(scene, mesh, node);
+        return;
+    }
+    fbxsdk::FbxMesh*& shared = scene.meshFor(detail::MeshArrays::identityOf(mesh));
+    if (shared != nullptr) {
+        node.SetNodeAttribute(shared);
+        node.SetShadingMode(fbxsdk::FbxNode::eTextureShading);
+    } else {
+        addGeometry(scene, mesh, node);
+        shared = node.GetMesh();
+    }
+}
+
 } // namespace
 
 void addObject(WrittenScene& scene, TnFbxMesh& source) {
@@ -173,7 +190,7 @@ void addObject(WrittenScene& scene, TnFbxMesh& source) {
     }
     detail::check(source, warnings);
     if (!source.getPointsPlaced()) {
-        addGeometry(scene, source, addPlacedNode(scene, source, kSameAxes));
+        addShared(scene, source, addPlacedNode(scene, source, kSameAxes));
         return;
     }
     if (const std::optional<TnFbxMesh> mesh = unplaced(scene, source)) {

@@ -6,6 +6,7 @@
 
 #include "KeyWriting.h"
 #include "access/ObjectWarnings.h"
+#include "model/MeshArrays.h"
 
 #include "TnFbxWriteInfo.h"
 
@@ -49,6 +50,9 @@ public:
         return *attribute;
     }
 
+    /// The mesh that is in the scene for those arrays; null at first.
+    fbxsdk::FbxMesh*& meshFor(const detail::MeshArrays::Identity& arrays) { return mMeshes[arrays]; }
+
     /// A name for a point cache that no other cache of the file has, in whatever case.
     std::string cacheNameFor(const std::string& mesh);
 
@@ -61,6 +65,7 @@ private:
     double mRate = 24.0;
     detail::ObjectWarnings mWarnings;
     std::set<std::string> mNodeNames, mCacheNames;
+    std::map<detail::MeshArrays::Identity, fbxsdk::FbxMesh*> mMeshes;
     std::map<std::string, int> mNextNumbers; // of caches, by the name of their mesh
 };
 

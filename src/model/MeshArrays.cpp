@@ -8,6 +8,8 @@ namespace Tarnell::Fbx::detail {
 
 namespace {
 
+constexpr char kSet = 1; // its address stands for a flag that is set
+
 template <typename Element>
 void reserveExactly(SharedArray<Element>& array, std::size_t count) {
     array.own().reserve(count);
@@ -47,6 +49,20 @@ std::uint64_t MeshArrays::bytesOfAnother(std::int64_t controlPoints, std::int64_
     constexpr std::size_t corner = sizeof(TnFbxMesh::Vector) + sizeof(TnFbxMesh::Colour);
     return static_cast<std::uint64_t>(controlPoints) * sizeof(TnFbxMesh::Vector) +
            static_cast<std::uint64_t>(polygonVertices) * corner;
+}
+
+MeshArrays::Identity MeshArrays::identityOf(const TnFbxMesh& mesh) {
+    const TnFbxMesh::Geometry& g = mesh.mGeometry;
+    const auto flag = [](bool value) -> const void* { return value ? &kSet : nullptr; };
+    return {g.polygonVertexSizes.data(),
+            g.pointIndices.data(),
+            g.controlPoints.data(),
+            g.normals.data(),
+            g.uvs.data(),
+            g.colours.data(),
+            flag(g.validNormals),
+            flag(g.validUVs),
+            flag(g.validColours)};
 }
 
 bool MeshArrays::allocate(int polygons, int controlPoints, int polygonVertices) {

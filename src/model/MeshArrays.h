@@ -6,6 +6,7 @@
 
 #include "TnFbxMesh.h"
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 
@@ -27,6 +28,10 @@ public:
 
     /// Whether other meshes have the same points, in the same memory.
     static bool sharesPoints(const TnFbxMesh& mesh) { return mesh.mGeometry.controlPoints.isShared(); }
+
+    /// Which arrays a mesh has, and which flags: the same for meshes that share all of them, as long as these live.
+    using Identity = std::array<const void*, 9>;
+    static Identity identityOf(const TnFbxMesh& mesh);
 
     /// To be called first; the mesh is initialised. False when a number is below 1; the mesh is empty then and no array
     /// may be asked for.

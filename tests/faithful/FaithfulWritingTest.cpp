@@ -4,6 +4,8 @@
 // What is written faithfully and read faithfully comes back: every kind and channel, in every version and encoding.
 #include "FaithfulFixture.h"
 
+#include "FbxFaithful.h"
+
 #include "support/WritingBuilders.h"
 
 #include "TnFbxError.h"
@@ -514,6 +516,31 @@ TEST(FaithfulWriting, WritesWhatAReadPlacedWhereItWas) {
     }
 }
 
+TEST(FaithfulWriting, WritesMeshesThatShareTheirArraysAsOne) {
+    for (const auto version : {TnFbxWriteInfo::kFbxVersion2010, TnFbxWriteInfo::kFbxVersion2016}) {
+        FaithfulFile file(version);
+        auto first = polygonMesh("first", 4);
+        TnFbxMesh second(*first), changed(*first);
+        second.setName("second");
+        second.setTransformValue(Transform::kFbxTransformPositionX, 5.0f);
+        changed.setName("changed");
+        changed.setControlPoint(0, 77.0f, 0.0f, 0.0f);
+        file.write({{}, {}, {}, {}, {first.get(), &second, &changed}});
+        EXPECT_EQ(file.warningText(), "");
+
+        FbxFaithful reader;
+        ASSERT_TRUE(reader.load(file.readInfo())) << lastError();
+        fbxsdk::FbxScene& scene = *reader.getScene();
+        EXPECT_EQ(scene.GetSrcObjectCount(fbxsdk::FbxCriteria::ObjectType(fbxsdk::FbxMesh::ClassId)), 2);
+        EXPECT_EQ(scene.GetRootNode()->GetChild(1)->GetMesh(), scene.GetRootNode()->GetChild(0)->GetMesh());
+        auto read = file.read<TnFbxMesh>();
+        ASSERT_EQ(read.names(), (std::vector<std::string>{"first", "second", "changed"}));
+        EXPECT_EQ(pointsOf(read["second"]), pointsOf(*first));
+        EXPECT_EQ(pointsOf(read["changed"]), pointsOf(changed));
+        expectSameTransform(second, read["second"]);
+    }
+}
+
 TEST(FaithfulWriting, GivesMeshesOfOneNameTheirOwnCaches) {
     FaithfulFile file;
     file.info.setStartFrame(1.0f);
@@ -538,7 +565,7 @@ TEST(FaithfulWriting, GivesAStillMeshNoCache) {
     auto still = polygonMesh("still");
     auto moving = movingMesh("moving", 2);
     file.write({{}, {}, {}, {}, {still.get(), moving.get()}});
-    EXPECT_NE(file.warningText().find("moving: it has another number of sets"), std::string::npos);
+    EXPECT_NE(file.warningText().find("moving: the number of its sets of points"), std::string::npos);
     EXPECT_FALSE(
         std::filesystem::exists(file.info.getFileName().substr(0, file.info.getFileName().size() - 4) + "_fpc"));
     EXPECT_EQ(file.read<TnFbxMesh>().count, 2);

@@ -13,9 +13,9 @@ import unittest
 from support import ROOT, peak_of
 
 # Those whose objects the tool holds while it converts: meshes that the file has once, or samples of every frame.
-HANDED_OUT = {"instances": 600 << 20, "surfaces": 1 << 30, "claim": 256 << 20, "clip_meshes": 256 << 20}
+HANDED_OUT = {"surfaces": 1 << 30, "claim": 256 << 20, "clip_meshes": 256 << 20}
 # The others at the generator's own sizes, which take seconds.
-SIZES = {"instances": 600, "nulls": 20_000, "meshes": 10_000, "big": 20_000}
+SIZES = {"nulls": 20_000, "meshes": 10_000, "big": 20_000}
 
 
 def generator():

@@ -147,6 +147,8 @@ private:
         const bool deforms = node.GetGeometry()->GetDeformerCount() > 0;
         if (deforms || moves(mesh))
             mMoving.emplace_back(&node, &mesh);
+        const bool isInstance = !mKnownMeshes.insert(node.GetMesh()).second;
+        mSplit += isInstance && (deforms || (cachesPoints() && moves(mesh))) ? 1 : 0;
         mDeforming += deforms ? 1 : 0;
         mWithoutPolygons += mesh.getNumberOfPolygons() < 1 ? 1 : 0;
         return true;
@@ -182,6 +184,7 @@ private:
     void addLosses() {
         const bool still = !cachesPoints() && mReader.getFirstFrame() < mReader.getLastFrame();
         mLosses.add(still ? mDeforming : 0, "written as they stand at the first frame (see --frames): moving meshes");
+        mLosses.add(mSplit, "written anew for each node: moving meshes that nodes have in common");
         mLosses.add(mWithoutPolygons, "written as points: meshes without polygons");
         if (wants("transforms")) {
             mLosses.add(mMarkers, "written as nulls, without look, size and colour: markers");
@@ -219,7 +222,8 @@ private:
     Objects<TnFbxTransform> mTransforms;
     Objects<TnFbxMesh> mMeshes;
     std::vector<std::pair<FbxNode*, TnFbxMesh*>> mMoving;
-    int mMarkers = 0, mBones = 0, mDeforming = 0, mWithoutPolygons = 0;
+    std::set<const FbxMesh*> mKnownMeshes;
+    int mMarkers = 0, mBones = 0, mDeforming = 0, mSplit = 0, mWithoutPolygons = 0;
     Losses mLosses;
     std::vector<std::string> mWarnings;
     std::set<std::string> mKnownWarnings;

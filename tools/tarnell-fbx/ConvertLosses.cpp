@@ -125,7 +125,7 @@ struct NodeCounts {
         hidden += isHidden(node) ? 1 : 0;
         ownProperties += hasOwnProperties(node) ? 1 : 0;
         if (attribute && isOfKind) {
-            shared += seen.insert(attribute).second ? 0 : 1;
+            shared += seen.insert(attribute).second || attribute->Is<FbxMesh>() ? 0 : 1;
             add(*attribute);
         }
     }
@@ -204,7 +204,7 @@ void Losses::addScene(FbxScene& scene) {
             nodes.add(*entry.node);
     }
     add(nodes.parents, "written below the root, where they are in the world: objects below others");
-    add(nodes.shared, "written anew for each node: meshes and other attributes that nodes have in common");
+    add(nodes.shared, "written anew for each node: cameras, lights and nulls that nodes have in common");
     if (wants("meshes")) {
         add(countOf<FbxSurfaceMaterial>(scene), "not written: materials");
         add(countOf<FbxTexture>(scene), "not written: textures");
