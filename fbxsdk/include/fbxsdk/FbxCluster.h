@@ -4,8 +4,6 @@
 // The control points that follow one node, and how strongly.
 #pragma once
 
-#include <memory>
-
 #include <fbxsdk/FbxAMatrix.h>
 #include <fbxsdk/FbxDeformer.h>
 #include <fbxsdk/FbxPlainArray.h>
@@ -13,10 +11,6 @@
 FBXSDK_NAMESPACE_BEGIN
 
 class FbxNode;
-
-namespace detail {
-struct GeometrySource;
-}
 
 /// Indices and weights that stand in a file are read on the first access; the indices are not checked against the
 /// geometry.
@@ -61,26 +55,20 @@ public:
     FbxAMatrix& GetTransformParentMatrix(FbxAMatrix& pMatrix) const { return pMatrix = mTransformParent; }
     [[nodiscard]] bool IsTransformParentSet() const { return mTransformParentSet; }
 
-    /// For the scene reader.
-    void setSource(std::unique_ptr<detail::GeometrySource> pSource);
+    /// The platform's own view: of indices and weights the first ones count, as many as there are of both.
+    [[nodiscard]] detail::PlainArray<int>& indices() { return mIndices; }
+    [[nodiscard]] detail::PlainArray<double>& weights() { return mWeights; }
 
 protected:
     FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
-    void ensureLoaded() const {
-        if (mSource)
-            loadSource();
-    }
-    void loadSource() const;
-
     ELinkMode mLinkMode = eNormalize;
     FbxNode* mLink = nullptr;
     FbxAMatrix mTransform, mTransformLink, mTransformAssociateModel, mTransformParent;
     bool mTransformParentSet = false;
-    mutable detail::PlainArray<int> mIndices;
-    mutable detail::PlainArray<double> mWeights;
-    mutable std::unique_ptr<detail::GeometrySource> mSource;
+    detail::PlainArray<int> mIndices;
+    detail::PlainArray<double> mWeights;
 };
 
 FBXSDK_NAMESPACE_END

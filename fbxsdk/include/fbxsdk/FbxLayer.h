@@ -23,7 +23,6 @@ class FbxSurfaceMaterial;
 class FbxTexture;
 
 namespace detail {
-struct ElementSource;
 struct GeometrySource;
 struct LayerElementAccess;
 
@@ -217,8 +216,6 @@ protected:
     /// Removes entries from the array that the mapping counts in: the index array where indices are in use.
     virtual void removeEntries(int pFirst, int pCount) = 0;
 
-    mutable std::unique_ptr<detail::ElementSource> mSource; ///< arrays that nobody has asked for stay in the file
-
 private:
     friend class FbxLayerContainer;
     friend struct detail::LayerElementAccess;
@@ -240,16 +237,12 @@ public:
 
     /// Throws std::runtime_error when there is no such array, which is so in damaged elements only.
     [[nodiscard]] FbxLayerElementArrayTemplate<T>& GetDirectArray() const {
-        if (mSource)
-            readPending();
         if (!mDirectArray)
             detail::throwMissingDirectArray();
         return *mDirectArray;
     }
     /// Empty unless the reference mode asks for indices.
     [[nodiscard]] FbxLayerElementArrayTemplate<int>& GetIndexArray() const {
-        if (mSource)
-            readPending();
         if (!mIndexArray)
             detail::throwMissingIndexArray();
         return *mIndexArray;
@@ -262,7 +255,6 @@ protected:
     ~FbxLayerElementTemplate() override;
 
     void removeEntries(int pFirst, int pCount) override;
-    void readPending() const;
 
 private:
     friend struct detail::LayerElementAccess;

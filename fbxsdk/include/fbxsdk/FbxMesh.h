@@ -100,7 +100,6 @@ private:
     detail::PlainArray<int> mPolygonVertices;
     detail::PlainArray<int> mPolygonStarts;
     detail::PlainArray<int> mEdges;
-    std::unique_ptr<detail::ElementSource> mEdgeSource;
     int mRepairedCorners = 0;
     bool mPolygonOpen = false;
 };

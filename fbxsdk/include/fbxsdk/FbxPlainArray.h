@@ -1,9 +1,12 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The memory behind geometry: contiguous items of plain types that can grow without being initialised, so that a file's
-// numbers are decoded straight into place. Items that a file holds just as they are, compressed or not, stay there as
-// long as only their values are asked for.
+// The memory of geometry: contiguous items of plain types that can grow without being initialised, so that a file's
+// numbers are decoded straight into place.
+//
+// Arrays are read late. An array of a file has a source in place of items until somebody asks for one or for their
+// number. Items that the file holds in the layout of memory, compressed or not, stay with the source even then, as long
+// as only their values are asked for.
 #pragma once
 
 #include <algorithm>
@@ -18,38 +21,40 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-class StoredBytes;
-
 /// How many bytes of an item a file has; the others are those of a new item.
 template <class T>
 inline constexpr std::size_t kStoredBytes = sizeof(T);
 template <>
 inline constexpr std::size_t kStoredBytes<FbxVector4> = 3 * sizeof(double);
 
-/// Items of a file, packed. Whoever reads them more or less in order sees them through a window that moves along, and
-/// what lies before it takes no memory any more.
-class FBXSDK_DLL StoredItems {
+/// Where the items of an array are until they are in memory. What is shown is seen through a window that moves along.
+///
+/// Functions that read throw when the file was changed meanwhile, and std::bad_alloc. The source is as before then.
+class FBXSDK_DLL ItemSource {
 public:
-    StoredItems(std::unique_ptr<StoredBytes> pSource, int pCount, std::size_t pItemBytes);
-    StoredItems(const StoredItems&) = delete;
-    StoredItems& operator=(const StoredItems&) = delete;
-    ~StoredItems();
+    ItemSource() = default;
+    ItemSource(const ItemSource&) = delete;
+    ItemSource& operator=(const ItemSource&) = delete;
+    virtual ~ItemSource();
 
-    /// The bytes of an item that exists.
+    [[nodiscard]] virtual int count() const = 0;
+    [[nodiscard]] virtual std::size_t itemSize() const = 0; ///< in memory
+    /// Prepares to show items. False when they can only be read, or are corrupt.
+    [[nodiscard]] virtual bool show() = 0;
+    /// Reads all items into the memory, shown or not. False when they are corrupt.
+    [[nodiscard]] virtual bool read(void* pItems) = 0;
+
+    /// The packed bytes of an item that exists, until the next call. Items must be shown.
     [[nodiscard]] const char* at(int pIndex, std::size_t pItemBytes) {
         if (static_cast<unsigned>(pIndex - mWindowStart) >= static_cast<unsigned>(mWindowSize))
             moveWindow(pIndex);
         return mWindow + static_cast<std::size_t>(pIndex - mWindowStart) * pItemBytes;
     }
 
-private:
-    void moveWindow(int pIndex);
-    void releaseUpTo(int pEnd);
+protected:
+    virtual void moveWindow(int pIndex) = 0;
 
-    std::unique_ptr<StoredBytes> mSource;
     const char* mWindow = nullptr; ///< the first item of the window
-    std::size_t mItemBytes;
-    int mCount;
     int mWindowStart = 0;
     int mWindowSize = 0;
 };
@@ -62,20 +67,31 @@ public:
     PlainStorage& operator=(const PlainStorage&) = delete;
     ~PlainStorage();
 
-    [[nodiscard]] int count() const { return mCount; }
-    [[nodiscard]] bool contains(int pIndex) const { return pIndex >= 0 && pIndex < mCount; }
+    [[nodiscard]] int count() const {
+        if (mCount == kUnread)
+            open();
+        return mCount;
+    }
+    [[nodiscard]] bool contains(int pIndex) const { return pIndex >= 0 && pIndex < count(); }
+    /// Whether nobody has asked for the items of the source yet.
+    [[nodiscard]] bool isPending() const { return mCount == kUnread; }
+    /// Takes the items of the source in place of all that were there, when somebody asks for them.
+    void setSource(std::unique_ptr<ItemSource> pSource);
 
 protected:
     [[nodiscard]] void* items() const { return mItems; }
-    /// Whether the items still stand in a file; there is no other memory behind them then.
-    [[nodiscard]] bool isStored() const { return mStored != nullptr; }
-    [[nodiscard]] StoredItems& stored() const { return *mStored; }
-    /// Makes that many items of what a file holds. There must be no items yet.
-    void store(std::unique_ptr<StoredItems> pItems, int pCount);
-    /// The count remains, and memory for as many items has to be written to.
-    [[nodiscard]] void* roomForStored(std::size_t pItemSize) const;
-    void leaveFile() const;
-    void forgetStored();
+    /// Whether the source shows the items; there is no other memory of them then.
+    [[nodiscard]] bool isShown() const {
+        if (mCount == kUnread)
+            open();
+        return mSource != nullptr;
+    }
+    [[nodiscard]] ItemSource& source() const { return *mSource; }
+    void ensureInMemory() const {
+        if (mSource)
+            readSource();
+    }
+    void clearItems();
 
     /// Room for that many items. Throws std::bad_alloc when there is none; the items are untouched then.
     void reserveItems(int pCapacity, std::size_t pItemSize);
@@ -86,17 +102,21 @@ protected:
     void closeSlots(int pIndex, int pCount, std::size_t pItemSize);
 
 private:
+    static constexpr int kUnread = -1;
+
+    void open() const;
+    void readSource() const;
     void allocate(int pCapacity, std::size_t pItemSize) const;
 
-    // That items come out of the file is no change of the array.
-    mutable std::unique_ptr<StoredItems> mStored;
+    // That items come out of the source is no change of the array.
+    mutable std::unique_ptr<ItemSource> mSource;
     mutable void* mItems = nullptr;
     mutable int mCapacity = 0;
-    int mCount = 0;
+    mutable int mCount = 0;
 };
 
 /// A growing array of a plain type. Negative counts mean none; indices are the caller's to check. Whoever asks for more
-/// than values gets all items out of the file first.
+/// than values gets all items into memory first.
 template <class T>
 class PlainArray : public PlainStorage {
     static_assert(std::is_trivially_copyable<T>::value, "items are moved as bytes");
@@ -107,17 +127,12 @@ public:
         return static_cast<T*>(items());
     }
     [[nodiscard]] T value(int pIndex) const {
-        return isStored() ? storedItem(stored(), pIndex) : static_cast<const T*>(items())[pIndex];
+        return isShown() ? shownItem(pIndex) : static_cast<const T*>(items())[pIndex];
     }
     [[nodiscard]] T& operator[](int pIndex) const { return data()[pIndex]; }
     [[nodiscard]] T* begin() const { return data(); }
     [[nodiscard]] T* end() const { return data() + count(); }
 
-    /// The items that a file's bytes are, kStoredBytes<T> each, in place of all that were there.
-    void keepStored(std::unique_ptr<StoredItems> pItems, int pCount) {
-        clear();
-        store(std::move(pItems), pCount);
-    }
     void reserve(int pCapacity) {
         ensureInMemory();
         reserveItems(pCapacity, kItemBytes);
@@ -147,28 +162,15 @@ public:
         ensureInMemory();
         closeSlots(pIndex, pCount, kItemBytes);
     }
-    void clear() {
-        forgetStored();
-        resizeUninitialised(0);
-    }
+    void clear() { clearItems(); }
 
 private:
     static constexpr std::size_t kItemBytes = sizeof(T); // NOLINT(bugprone-sizeof-expression): items can be pointers
 
-    static T storedItem(StoredItems& pItems, int pIndex) {
+    T shownItem(int pIndex) const {
         T item{};
-        std::memcpy(static_cast<void*>(&item), pItems.at(pIndex, kStoredBytes<T>), kStoredBytes<T>);
+        std::memcpy(static_cast<void*>(&item), source().at(pIndex, kStoredBytes<T>), kStoredBytes<T>);
         return item;
-    }
-    void ensureInMemory() const {
-        if (isStored())
-            readStored();
-    }
-    void readStored() const {
-        T* const to = static_cast<T*>(roomForStored(kItemBytes));
-        for (int i = 0; i < count(); ++i)
-            to[i] = storedItem(stored(), i);
-        leaveFile(); // not before all of them are read: a file may have been changed
     }
 };
 

@@ -65,6 +65,15 @@ void readCluster(FbxCluster& cluster, const Record& body) {
         cluster.SetTransformAssociateModelMatrix(*associate);
 }
 
+void readClusterPoints(FbxCluster& cluster, const std::shared_ptr<const Document>& document, const Record& body) {
+    const Record* indices = body.child("Indexes");
+    const Record* weights = body.child("Weights");
+    if (!indices || !weights)
+        return;
+    readLate(document, *indices, cluster.indices(), LateReading::whole);
+    readLate(document, *weights, cluster.weights(), LateReading::whole);
+}
+
 void readChannel(FbxBlendShapeChannel& channel, const DocumentObject& object) {
     if (const Record* record = object.body->child("FullWeights")) {
         std::vector<double> weights(record->numberCount());
@@ -84,22 +93,10 @@ void readDeformer(FbxObject& deformer, const std::shared_ptr<const Document>& do
         readSkin(*skin, *object.body);
     } else if (auto* cluster = FbxCast<FbxCluster>(&deformer)) {
         readCluster(*cluster, *object.body);
-        cluster->setSource(std::make_unique<GeometrySource>(GeometrySource{document, object.body}));
+        readClusterPoints(*cluster, document, *object.body);
     } else if (auto* channel = FbxCast<FbxBlendShapeChannel>(&deformer)) {
         readChannel(*channel, object);
     }
-}
-
-void readClusterPoints(const Record& body, PlainArray<int>& indices, PlainArray<double>& weights) {
-    const Record* indexRecord = body.child("Indexes");
-    const Record* weightRecord = body.child("Weights");
-    if (!indexRecord || !weightRecord)
-        return;
-    readItems(*indexRecord, indices);
-    readItems(*weightRecord, weights);
-    const int count = std::min(indices.count(), weights.count());
-    indices.resizeUninitialised(count);
-    weights.resizeUninitialised(count);
 }
 
 } // namespace detail

@@ -4,9 +4,10 @@
 // Clusters. The associate model hangs on a property, as older files have it, since a plain source node is the link.
 #include <fbxsdk/FbxCluster.h>
 
+#include <algorithm>
+
 #include <fbxsdk/FbxNode.h>
 
-#include "geometry/DeformerReading.h"
 #include "object/ManagerData.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -48,36 +49,27 @@ FbxNode* FbxCluster::GetAssociateModel() const {
 }
 
 void FbxCluster::AddControlPointIndex(int pIndex, double pWeight) {
-    ensureLoaded();
+    // What a file has too many of one of them counts for nothing.
+    const int count = GetControlPointIndicesCount();
+    mIndices.resizeUninitialised(count);
+    mWeights.resizeUninitialised(count);
     mIndices.add(pIndex);
     mWeights.add(pWeight);
 }
 
-int FbxCluster::GetControlPointIndicesCount() const {
-    ensureLoaded();
-    return mIndices.count();
-}
+int FbxCluster::GetControlPointIndicesCount() const { return std::min(mIndices.count(), mWeights.count()); }
 
 int* FbxCluster::GetControlPointIndices() const {
-    ensureLoaded();
-    return mIndices.count() == 0 ? nullptr : mIndices.data();
+    return GetControlPointIndicesCount() == 0 ? nullptr : mIndices.data();
 }
 
 double* FbxCluster::GetControlPointWeights() const {
-    ensureLoaded();
-    return mWeights.count() == 0 ? nullptr : mWeights.data();
+    return GetControlPointIndicesCount() == 0 ? nullptr : mWeights.data();
 }
 
 void FbxCluster::SetTransformParentMatrix(const FbxAMatrix& pMatrix) {
     mTransformParent = pMatrix;
     mTransformParentSet = true;
-}
-
-void FbxCluster::setSource(std::unique_ptr<detail::GeometrySource> pSource) { mSource = std::move(pSource); }
-
-void FbxCluster::loadSource() const {
-    const std::unique_ptr<detail::GeometrySource> source = std::move(mSource);
-    detail::readClusterPoints(*source->body, mIndices, mWeights);
 }
 
 void FbxCluster::connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) {

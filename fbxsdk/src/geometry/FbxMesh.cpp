@@ -55,21 +55,16 @@ bool FbxMesh::readSource(const detail::GeometrySource& pSource) {
     mRepairedCorners = detail::readMesh(*this, pSource);
     detail::readLayers(*this, pSource);
     if (const detail::Record* edges = pSource.body->child("Edges"))
-        mEdgeSource.reset(new detail::ElementSource{pSource.document, nullptr, edges});
+        detail::readLate(pSource.document, *edges, mEdges, detail::LateReading::whole);
     return true;
 }
 
 detail::PlainArray<int>& FbxMesh::edges() {
     ensureLoaded();
-    if (const std::unique_ptr<detail::ElementSource> source = std::move(mEdgeSource))
-        detail::readItems(*source->index, mEdges);
     return mEdges;
 }
 
-void FbxMesh::dropEdges() {
-    mEdgeSource.reset();
-    mEdges.clear();
-}
+void FbxMesh::dropEdges() { mEdges.clear(); }
 
 void FbxMesh::BeginPolygon(int pMaterial, int pTexture, int pGroup, bool /*pLegacy*/) {
     detachSource();

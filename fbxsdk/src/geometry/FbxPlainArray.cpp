@@ -9,20 +9,11 @@
 #include <cstring>
 #include <new>
 
-#include "geometry/StoredBytes.h"
-
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
 constexpr int kSmallestCapacity = 8;
-
-/// How many items are kept at hand while they are read in order: an eighth, of long arrays less, but enough that asking
-/// the system costs nothing beside them.
-int windowSize(int count, std::size_t itemBytes) {
-    constexpr std::size_t kMostBytes = std::size_t{1} << 18;
-    return std::min(count / 8 + 2, static_cast<int>(kMostBytes / itemBytes));
-}
 
 std::byte* itemAt(void* items, int index, std::size_t itemSize) {
     return static_cast<std::byte*>(items) + static_cast<std::size_t>(index) * itemSize;
@@ -36,63 +27,35 @@ int grownCapacity(int capacity, int needed) {
 
 } // namespace
 
-StoredItems::StoredItems(std::unique_ptr<StoredBytes> pSource, int pCount, std::size_t pItemBytes)
-    : mSource(std::move(pSource)), mItemBytes(pItemBytes), mCount(pCount) {}
-
-StoredItems::~StoredItems() { releaseUpTo(mCount); }
-
-/// Releases the items up to an index, those before the window for the second time: they may share a page with others.
-void StoredItems::releaseUpTo(int pEnd) {
-    constexpr std::size_t kLargestPage = std::size_t{1} << 16;
-    const std::size_t start = static_cast<std::size_t>(mWindowStart) * mItemBytes;
-    const std::size_t from = start - std::min(start, kLargestPage);
-    mSource->release(mSource->bytes().subspan(from, static_cast<std::size_t>(pEnd) * mItemBytes - from));
-}
-
-// An index a little behind the window moves it along, so that half of it lies on either side of the index. The first
-// index starts over. With any other one there is no order, and everything stays at hand from then on.
-//
-// The last item is in the window only when it has been asked for: then most of the others are released with it.
-void StoredItems::moveWindow(int pIndex) {
-    const int size = windowSize(mCount, mItemBytes);
-    const int end = mWindowStart + mWindowSize;
-    int start = 0;
-    if (pIndex >= end && pIndex - end < size / 2) {
-        start = std::max(mWindowStart, pIndex - size / 2);
-        releaseUpTo(start);
-    } else {
-        mSource->restore();
-    }
-    const int last = mCount - 1;
-    const bool ordered = start > 0 || pIndex < size;
-    const int count = !ordered || pIndex == last ? mCount - start : std::min(size, last - start);
-    mWindowSize = 0; // should the source fail
-    mWindow = mSource->look(mSource->bytes().subspan(static_cast<std::size_t>(start) * mItemBytes,
-                                                     static_cast<std::size_t>(count) * mItemBytes));
-    mWindowStart = start;
-    mWindowSize = count;
-}
+ItemSource::~ItemSource() = default;
 
 PlainStorage::PlainStorage() = default;
 PlainStorage::~PlainStorage() { std::free(mItems); }
 
-void PlainStorage::store(std::unique_ptr<StoredItems> pItems, int pCount) {
-    mStored = std::move(pItems);
-    mCount = pCount;
+void PlainStorage::setSource(std::unique_ptr<ItemSource> pSource) {
+    clearItems();
+    mSource = std::move(pSource);
+    mCount = kUnread;
 }
 
-void* PlainStorage::roomForStored(std::size_t pItemSize) const {
-    allocate(mCount, pItemSize); // where there is no memory, the items are still in the file
-    return mItems;
+void PlainStorage::open() const {
+    if (mSource->show())
+        mCount = mSource->count();
+    else
+        readSource();
 }
 
-void PlainStorage::leaveFile() const { mStored.reset(); }
+void PlainStorage::readSource() const {
+    const int count = mSource->count();
+    allocate(count, mSource->itemSize());
+    const bool sound = mSource->read(mItems);
+    mSource.reset(); // not before all of them are read: a file may have been changed
+    mCount = sound ? count : 0;
+}
 
-void PlainStorage::forgetStored() {
-    if (mStored) {
-        mStored.reset();
-        mCount = 0;
-    }
+void PlainStorage::clearItems() {
+    mSource.reset();
+    mCount = 0;
 }
 
 void PlainStorage::reserveItems(int pCapacity, std::size_t pItemSize) { allocate(pCapacity, pItemSize); }

@@ -21,13 +21,5 @@ struct GeometrySource {
     std::shared_ptr<const MeshOfSurface> surface{}; ///< of a mesh that is made of one; there is no document then
 };
 
-/// The arrays of one layer element; null for an array that the element has not.
-struct ElementSource {
-    std::shared_ptr<const Document> document;
-    const Record* direct = nullptr;
-    const Record* index = nullptr;
-    const Record* fourth = nullptr; ///< the fourth numbers of vectors; 1 each where there are none
-};
-
 } // namespace detail
 FBXSDK_NAMESPACE_END

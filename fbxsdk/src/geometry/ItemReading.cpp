@@ -13,7 +13,7 @@
 
 #include "container/ByteOrder.h"
 #include "container/NumberDecoding.h"
-#include "geometry/StoredBytes.h"
+#include "geometry/StoredItems.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -27,6 +27,52 @@ int itemCount(const Record& record, std::size_t numbersPerItem) {
     return static_cast<int>(std::min(record.numberCount() / numbersPerItem, kMost));
 }
 
+/// So many numbers of a record are an item.
+template <class Item>
+constexpr std::size_t kNumbersPerItem = kStoredBytes<Item> / sizeof(double);
+template <>
+constexpr std::size_t kNumbersPerItem<int> = 1;
+template <>
+constexpr std::size_t kNumbersPerItem<bool> = 1;
+
+/// Item consists of doubles and nothing else.
+template <class Item>
+bool decodeInPlace(const Record& record, std::span<Item> items) {
+    constexpr std::size_t kNumbers = sizeof(Item) / sizeof(double); // NOLINT(bugprone-sizeof-expression)
+    return record.readNumbers(std::span(reinterpret_cast<double*>(items.data()), items.size() * kNumbers));
+}
+
+bool decode(const Record& record, std::span<FbxVector4> items) {
+    auto* const numbers = reinterpret_cast<double*>(items.data());
+    const std::span stored(numbers + items.size(), 3 * items.size());
+    if (!record.readNumbers(stored))
+        return false;
+    const double* from = stored.data();
+    for (std::size_t i = 0; i < items.size(); ++i, from += 3) {
+        const double x = from[0], y = from[1], z = from[2]; // the last points overlap with where they go
+        items[i] = FbxVector4(x, y, z, 1.0);
+    }
+    return true;
+}
+
+bool decode(const Record& record, std::span<FbxVector2> items) { return decodeInPlace(record, items); }
+bool decode(const Record& record, std::span<FbxColor> items) { return decodeInPlace(record, items); }
+bool decode(const Record& record, std::span<double> items) { return decodeInPlace(record, items); }
+bool decode(const Record& record, std::span<int> items) { return record.readNumbers(items); }
+
+bool decode(const Record& record, std::span<bool> items) {
+    std::vector<std::int32_t> numbers(items.size());
+    const bool decoded = record.readNumbers(numbers);
+    std::transform(numbers.begin(), numbers.end(), items.begin(), [](std::int32_t number) { return number != 0; });
+    return decoded;
+}
+
+template <class Item>
+std::span<Item> resized(const Record& record, PlainArray<Item>& items, std::size_t numbersPerItem) {
+    items.resizeUninitialised(itemCount(record, numbersPerItem));
+    return {items.data(), static_cast<std::size_t>(items.count())};
+}
+
 template <class Item>
 bool keptIf(bool decoded, PlainArray<Item>& items) {
     if (!decoded)
@@ -34,14 +80,9 @@ bool keptIf(bool decoded, PlainArray<Item>& items) {
     return decoded;
 }
 
-/// Item consists of doubles and nothing else.
 template <class Item>
-bool readInPlace(const Record& record, PlainArray<Item>& items) {
-    constexpr std::size_t kNumbersPerItem = sizeof(Item) / sizeof(double); // NOLINT(bugprone-sizeof-expression)
-    const int count = itemCount(record, kNumbersPerItem);
-    items.resizeUninitialised(count);
-    const std::span numbers(reinterpret_cast<double*>(items.data()), static_cast<std::size_t>(count) * kNumbersPerItem);
-    return keptIf(record.readNumbers(numbers), items);
+bool decodeAll(const Record& record, PlainArray<Item>& items) {
+    return keptIf(decode(record, resized(record, items, kNumbersPerItem<Item>)), items);
 }
 
 /// Smaller arrays are not worth a window to the file.
@@ -82,74 +123,76 @@ FourthNumbers unusualFourths(const Record* record) {
     return usual ? FourthNumbers{} : FourthNumbers{std::move(numbers), count};
 }
 
+/// The array of a record.
+template <class Item>
+class RecordItems final : public StoredItems<Item> {
+public:
+    RecordItems(std::shared_ptr<const Document> document, const Record& record, LateReading reading,
+                const Record* fourth)
+        : StoredItems<Item>(itemCount(record, kNumbersPerItem<Item>)), mDocument(std::move(document)), mRecord(record),
+          mReading(reading), mFourth(fourth) {}
+
+    [[nodiscard]] bool show() override {
+        const StoredArray* const array = mRecord.array();
+        const std::shared_ptr<const FileBytes>& file = mDocument->tree->file;
+        if (mReading == LateReading::whole || !array || !file || !file->contains(array->bytes) ||
+            !holdsItems<Item>(*array) || unusualFourths(mFourth).count > 0)
+            return false;
+        this->setBytes(storedBytes(file, *array));
+        if (this->hasBytes())
+            mDocument.reset(); // the bytes need the file alone
+        return this->hasBytes();
+    }
+
+    [[nodiscard]] bool read(void* items) override {
+        if (this->hasBytes())
+            return StoredItems<Item>::read(items);
+        const std::span<Item> all(static_cast<Item*>(items), static_cast<std::size_t>(this->count()));
+        if (!decode(mRecord, all))
+            return false;
+        if constexpr (std::is_same_v<Item, FbxVector4>) {
+            const auto [numbers, count] = unusualFourths(mFourth);
+            for (std::size_t i = 0; i < std::min(static_cast<std::size_t>(count), all.size()); ++i)
+                all[i][3] = numbers[i];
+        }
+        return true;
+    }
+
+private:
+    std::shared_ptr<const Document> mDocument;
+    const Record& mRecord; ///< of the document
+    LateReading mReading;
+    const Record* mFourth;
+};
+
 } // namespace
 
-bool readItems(const Record& record, PlainArray<FbxVector4>& items) {
-    const int count = itemCount(record, 3);
-    const auto points = static_cast<std::size_t>(count);
-    items.resizeUninitialised(count);
-    auto* const numbers = reinterpret_cast<double*>(items.data());
-    const std::span stored(numbers + points, 3 * points);
-    if (!keptIf(record.readNumbers(stored), items))
-        return false;
-    const double* from = stored.data();
-    for (std::size_t i = 0; i < points; ++i, from += 3) {
-        const double x = from[0], y = from[1], z = from[2]; // the last points overlap with where they go
-        items.data()[i] = FbxVector4(x, y, z, 1.0);
-    }
-    return true;
-}
+bool readItems(const Record& record, PlainArray<FbxVector4>& items) { return decodeAll(record, items); }
+bool readItems(const Record& record, PlainArray<FbxVector2>& items) { return decodeAll(record, items); }
+bool readItems(const Record& record, PlainArray<FbxColor>& items) { return decodeAll(record, items); }
+bool readItems(const Record& record, PlainArray<int>& items) { return decodeAll(record, items); }
+bool readItems(const Record& record, PlainArray<double>& items) { return decodeAll(record, items); }
+bool readItems(const Record& record, PlainArray<bool>& items) { return decodeAll(record, items); }
 
-bool readWeightedPoints(const Record& record, PlainArray<FbxVector4>& items) { return readInPlace(record, items); }
-bool readItems(const Record& record, PlainArray<FbxVector2>& items) { return readInPlace(record, items); }
-bool readItems(const Record& record, PlainArray<FbxColor>& items) { return readInPlace(record, items); }
-bool readItems(const Record& record, PlainArray<double>& items) { return readInPlace(record, items); }
-
-bool readItems(const Record& record, PlainArray<int>& items) {
-    items.resizeUninitialised(itemCount(record, 1));
-    return keptIf(record.readNumbers(std::span<std::int32_t>(items.data(), static_cast<std::size_t>(items.count()))),
-                  items);
-}
-
-bool readItems(const Record& record, PlainArray<bool>& items) {
-    PlainArray<int> numbers;
-    const bool decoded = readItems(record, numbers);
-    items.resizeUninitialised(numbers.count());
-    std::transform(numbers.begin(), numbers.end(), items.begin(), [](int number) { return number != 0; });
-    return decoded;
+bool readWeightedPoints(const Record& record, PlainArray<FbxVector4>& items) {
+    return keptIf(decodeInPlace(record, resized(record, items, 4)), items);
 }
 
 template <class Item>
-bool fetchItems(const Document& document, const Record& record, PlainArray<Item>& items) {
-    const StoredArray* const array = record.array();
-    const std::shared_ptr<const FileBytes>& file = document.tree->file;
-    if (!array || !file || !file->contains(array->bytes) || !holdsItems<Item>(*array))
-        return readItems(record, items);
-    std::unique_ptr<StoredBytes> bytes = storedBytes(file, *array);
-    items.clear();
-    if (!bytes)
-        return false;
-    constexpr std::size_t kNumberBytes = std::is_same_v<Item, int> ? sizeof(std::int32_t) : sizeof(double);
-    const int count = itemCount(record, kStoredBytes<Item> / kNumberBytes);
-    items.keepStored(std::make_unique<StoredItems>(std::move(bytes), count, kStoredBytes<Item>), count);
-    return true;
+void readLate(std::shared_ptr<const Document> document, const Record& record, PlainArray<Item>& items,
+              LateReading reading, const Record* fourth) {
+    items.setSource(std::make_unique<RecordItems<Item>>(std::move(document), record, reading, fourth));
 }
 
-bool fetchVectors(const Document& document, const Record& record, const Record* fourth, PlainArray<FbxVector4>& items) {
-    const auto [numbers, count] = unusualFourths(fourth);
-    if (!fetchItems(document, record, items))
-        return false;
-    for (int i = 0; i < std::min(count, items.count()); ++i)
-        items[i][3] = numbers[static_cast<std::size_t>(i)];
-    return true;
-}
-
-template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector4>&);
-template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector2>&);
-template bool fetchItems(const Document&, const Record&, PlainArray<FbxColor>&);
-template bool fetchItems(const Document&, const Record&, PlainArray<int>&);
-template bool fetchItems(const Document&, const Record&, PlainArray<double>&);
-template bool fetchItems(const Document&, const Record&, PlainArray<bool>&);
+template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<FbxVector4>&, LateReading,
+                       const Record*);
+template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<FbxVector2>&, LateReading,
+                       const Record*);
+template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<FbxColor>&, LateReading,
+                       const Record*);
+template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<int>&, LateReading, const Record*);
+template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<double>&, LateReading, const Record*);
+template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<bool>&, LateReading, const Record*);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -27,21 +27,32 @@ bool readItems(const Record& record, PlainArray<int>& items);
 bool readItems(const Record& record, PlainArray<double>& items);
 bool readItems(const Record& record, PlainArray<bool>& items);
 
-/// The same for numbers of a document's tree, of which only the values may be asked for. Where a file has them in the
-/// shape of items, compressed or not, they are not kept in memory until somebody asks for more.
+/// What becomes of items at the first question.
+enum class LateReading {
+    shown, ///< items that the file has in the layout of memory, compressed or not, stay there while only values are
+           ///< asked for
+    whole  ///< all items are read when somebody asks for one
+};
+
+/// The same when somebody asks for the items. The document keeps the record alive until then. Vectors may have their
+/// fourth numbers in a record of their own; they are 1 where there is none, and where it is corrupt: nobody needs them
+/// to use the other three.
 template <class Item>
-bool fetchItems(const Document& document, const Record& record, PlainArray<Item>& items);
+void readLate(std::shared_ptr<const Document> document, const Record& record, PlainArray<Item>& items,
+              LateReading reading = LateReading::shown, const Record* fourth = nullptr);
 
-/// The same for vectors that may have their fourth numbers in a record of its own. They are 1 where there is none, and
-/// where it is corrupt: nobody needs them to use the other three.
-bool fetchVectors(const Document& document, const Record& record, const Record* fourth, PlainArray<FbxVector4>& items);
-
-extern template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector4>&);
-extern template bool fetchItems(const Document&, const Record&, PlainArray<FbxVector2>&);
-extern template bool fetchItems(const Document&, const Record&, PlainArray<FbxColor>&);
-extern template bool fetchItems(const Document&, const Record&, PlainArray<int>&);
-extern template bool fetchItems(const Document&, const Record&, PlainArray<double>&);
-extern template bool fetchItems(const Document&, const Record&, PlainArray<bool>&);
+extern template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<FbxVector4>&, LateReading,
+                              const Record*);
+extern template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<FbxVector2>&, LateReading,
+                              const Record*);
+extern template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<FbxColor>&, LateReading,
+                              const Record*);
+extern template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<int>&, LateReading,
+                              const Record*);
+extern template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<double>&, LateReading,
+                              const Record*);
+extern template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<bool>&, LateReading,
+                              const Record*);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -3,12 +3,8 @@
 //
 // Layer elements: their modes and arrays, and who they belong to.
 #include <stdexcept>
-#include <type_traits>
 
 #include <fbxsdk/FbxLayer.h>
-
-#include "geometry/GeometrySource.h"
-#include "geometry/ItemReading.h"
 
 FBXSDK_NAMESPACE_BEGIN
 
@@ -46,7 +42,6 @@ FbxLayerElementTemplate<T>::~FbxLayerElementTemplate() = default;
 
 template <class T>
 bool FbxLayerElementTemplate<T>::Clear() {
-    mSource.reset();
     if (mDirectArray)
         mDirectArray->Clear();
     if (mIndexArray)
@@ -56,27 +51,10 @@ bool FbxLayerElementTemplate<T>::Clear() {
 
 template <class T>
 void FbxLayerElementTemplate<T>::removeEntries(int pFirst, int pCount) {
-    if (mSource)
-        readPending();
     if (GetReferenceMode() != eDirect && mIndexArray)
         mIndexArray->items().remove(pFirst, pCount);
     else if (mDirectArray)
         mDirectArray->items().remove(pFirst, pCount);
-}
-
-template <class T>
-void FbxLayerElementTemplate<T>::readPending() const {
-    const std::unique_ptr<detail::ElementSource> source = std::move(mSource);
-    // Pointers are no content of files.
-    if constexpr (std::is_same_v<T, FbxVector4>) {
-        if (source->direct && mDirectArray)
-            detail::fetchVectors(*source->document, *source->direct, source->fourth, mDirectArray->items());
-    } else if constexpr (!std::is_pointer_v<T>) {
-        if (source->direct && mDirectArray)
-            detail::fetchItems(*source->document, *source->direct, mDirectArray->items());
-    }
-    if (source->index && mIndexArray)
-        detail::fetchItems(*source->document, *source->index, mIndexArray->items());
 }
 
 template class FbxLayerElementTemplate<FbxVector4>;

@@ -6,7 +6,6 @@
 
 #include <fbxsdk/FbxLayer.h>
 
-#include "geometry/GeometrySource.h"
 #include "schema/LayerElements.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -23,12 +22,6 @@ static_assert(kMappingModes.size() == FbxLayerElement::eAllSame + 1U &&
               kReferenceModes.size() == FbxLayerElement::eIndexToDirect + 1U);
 
 struct LayerElementAccess {
-    /// The element's arrays are decoded when somebody asks for one of them.
-    static void setSource(FbxLayerElement& element, std::unique_ptr<ElementSource> source) {
-        element.mSource = std::move(source);
-    }
-    [[nodiscard]] static bool isPending(const FbxLayerElement& element) { return element.mSource != nullptr; }
-
     // Slots of a layer: an element type, or the texture coordinates of a texture channel.
     [[nodiscard]] static int uvSlot(FbxLayerElement::EType channel) { return FbxLayer::uvSlot(channel); }
     [[nodiscard]] static FbxLayerElement* elementAt(const FbxLayer& layer, int slot) { return layer.mElements[slot]; }

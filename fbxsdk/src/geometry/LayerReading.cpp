@@ -17,8 +17,11 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #include <utility>
 
+#include "geometry/GeometrySource.h"
+#include "geometry/ItemReading.h"
 #include "geometry/LayerElementAccess.h"
 #include "schema/LayerElements.h"
 #include "schema/Spellings.h"
@@ -31,11 +34,29 @@ using Element = FbxLayerElement;
 using Access = LayerElementAccess;
 using Storage = LayerElementStorage;
 
-using CreateElement = Element* (*)(FbxLayerContainer& container, const char* name);
+/// The arrays of one element; null for an array that it has not. The fourth numbers are those of vectors.
+struct ArrayRecords {
+    const std::shared_ptr<const Document>& document;
+    const Record* direct;
+    const Record* fourth;
+    const Record* index;
+};
+
+using CreateElement = Element* (*)(FbxLayerContainer& container, const char* name, const ArrayRecords& records);
 
 template <class Class>
-Element* create(FbxLayerContainer& container, const char* name) {
-    return Class::Create(&container, name);
+Element* create(FbxLayerContainer& container, const char* name, const ArrayRecords& records) {
+    using Item = typename Class::ArrayElementType;
+    Class* element = Class::Create(&container, name);
+    // Pointers are no content of files.
+    if constexpr (!std::is_pointer_v<Item>) {
+        if (records.direct)
+            readLate(records.document, *records.direct, element->GetDirectArray().items(), LateReading::shown,
+                     records.fourth);
+    }
+    if (records.index)
+        readLate(records.document, *records.index, element->GetIndexArray().items());
+    return element;
 }
 
 /// The class of each type. All texture channels have the same.
@@ -157,15 +178,13 @@ private:
             return nullptr;
         if (*mapping == Element::eByEdge && !childWithNumbers(*mSource.body, "Edges"))
             return nullptr;
-        Element* element =
-            creatorOf(kind.row.type)(mContainer, std::string(record.childValue("Name").toText()).c_str());
+        const Element::EReferenceMode reference = referenceOf(record, kind.row.storage, index != nullptr);
+        const ArrayRecords arrays{mSource.document, direct, childWithNumbers(record, kind.row.fourth),
+                                  reference == Element::eDirect ? nullptr : index};
+        const std::string name(record.childValue("Name").toText());
+        Element* element = creatorOf(kind.row.type)(mContainer, name.c_str(), arrays);
         element->SetMappingMode(*mapping);
-        element->SetReferenceMode(referenceOf(record, kind.row.storage, index != nullptr));
-        if (element->GetReferenceMode() == Element::eDirect)
-            index = nullptr;
-        const Record* fourth = childWithNumbers(record, kind.row.fourth);
-        Access::setSource(*element,
-                          std::make_unique<ElementSource>(ElementSource{mSource.document, direct, index, fourth}));
+        element->SetReferenceMode(reference);
         return element;
     }
 

@@ -262,13 +262,14 @@ TEST_F(LayerReading, IgnoresEntriesForElementsThatAreNotThere) {
 }
 
 TEST_F(LayerReading, LeavesArraysInTheFileUntilSomebodyAsks) {
-    FbxMesh* mesh = triangle(element("LayerElementNormal", "ByPolygonVertex", "Direct", kNormals));
-    const FbxLayerElementNormal* normals = mesh->GetLayer(0)->GetNormals();
-    using Access = fbxsdk::detail::LayerElementAccess;
-    EXPECT_TRUE(Access::isPending(*normals));
+    FbxMesh* mesh = triangle(element("LayerElementUV", "ByPolygonVertex", "IndexToDirect", kUvs + "\n" + kUvIndex));
+    const FbxLayerElementUV* uvs = mesh->GetLayer(0)->GetUVs();
+    ASSERT_NE(uvs, nullptr);
+    EXPECT_TRUE(uvs->GetDirectArray().items().isPending());
 
-    EXPECT_EQ(normals->GetDirectArray().GetCount(), 3);
-    EXPECT_FALSE(Access::isPending(*normals));
+    EXPECT_EQ(uvs->GetDirectArray().GetCount(), 2);
+    EXPECT_FALSE(uvs->GetDirectArray().items().isPending());
+    EXPECT_TRUE(uvs->GetIndexArray().items().isPending()) << "each array for itself";
 }
 
 TEST_F(LayerReading, KeepsTheFileForArraysThatNobodyHasAskedFor) {

@@ -9,12 +9,13 @@
 #include <cstring>
 #include <numeric>
 #include <random>
+#include <stdexcept>
 #include <vector>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "geometry/StoredBytes.h"
+#include "geometry/StoredItems.h"
 #include "support/BinaryRecordBuilder.h"
 #include "support/TemporaryFolder.h"
 
@@ -60,9 +61,8 @@ void keep(PlainArray<Item>& array, const std::vector<Number>& numbers, Calls& ca
     std::vector<char> bytes(numbers.size() * sizeof(Number));
     std::memcpy(bytes.data(), numbers.data(), bytes.size());
     const int count = static_cast<int>(bytes.size() / kStoredBytes<Item>);
-    array.keepStored(std::make_unique<StoredItems>(std::make_unique<SpoilingBytes>(std::move(bytes), calls), count,
-                                                   kStoredBytes<Item>),
-                     count);
+    array.setSource(
+        std::make_unique<StoredItems<Item>>(std::make_unique<SpoilingBytes>(std::move(bytes), calls), count));
 }
 
 std::vector<int> upTo(int count) {
@@ -239,6 +239,75 @@ TEST(StoredItems, TakeThePlaceOfWhatWasThere) {
     EXPECT_TRUE(first.gone);
     EXPECT_EQ(array.count(), 2);
     EXPECT_EQ(array.value(1), 1);
+}
+
+/// Three numbers that cannot be shown, and can be read from the second time on.
+class ReluctantItems final : public ItemSource {
+public:
+    explicit ReluctantItems(Calls& calls, bool sound = true) : mCalls(calls), mSound(sound) {}
+    ~ReluctantItems() override { mCalls.gone = true; }
+
+    int count() const override { return 3; }
+    std::size_t itemSize() const override { return sizeof(int); }
+    bool show() override { return false; }
+    bool read(void* items) override {
+        if (!mAsked) {
+            mAsked = true;
+            throw std::runtime_error("the file was changed");
+        }
+        std::iota(static_cast<int*>(items), static_cast<int*>(items) + 3, 5);
+        return mSound;
+    }
+
+private:
+    void moveWindow(int) override { FAIL() << "nothing is shown"; }
+
+    Calls& mCalls;
+    bool mSound;
+    bool mAsked = false;
+};
+
+TEST(LateItems, AreReadAtTheFirstQuestionWhateverItIs) {
+    const auto read = [](auto&& ask) {
+        Calls calls;
+        PlainArray<int> array;
+        array.setSource(std::make_unique<ReluctantItems>(calls));
+        EXPECT_TRUE(array.isPending());
+        EXPECT_THROW(ask(array), std::runtime_error);
+        EXPECT_TRUE(array.isPending()) << "what could not be read fails again, or is there";
+        EXPECT_FALSE(calls.gone);
+        ask(array);
+        EXPECT_FALSE(array.isPending());
+        EXPECT_TRUE(calls.gone);
+        return std::vector<int>(array.begin(), array.end());
+    };
+    EXPECT_THAT(read([](PlainArray<int>& array) { EXPECT_EQ(array.count(), 3); }), ElementsAre(5, 6, 7));
+    EXPECT_THAT(read([](PlainArray<int>& array) { EXPECT_EQ(array.value(1), 6); }), ElementsAre(5, 6, 7));
+    EXPECT_THAT(read([](PlainArray<int>& array) { EXPECT_TRUE(array.contains(2)); }), ElementsAre(5, 6, 7));
+    EXPECT_THAT(read([](PlainArray<int>& array) { array.add(8); }), ElementsAre(5, 6, 7, 8));
+    EXPECT_THAT(read([](PlainArray<int>& array) { array.remove(1); }), ElementsAre(5, 7));
+    EXPECT_THAT(read([](PlainArray<int>& array) { array.reserve(9); }), ElementsAre(5, 6, 7));
+}
+
+TEST(LateItems, AreNoneWhereTheyAreCorrupt) {
+    Calls calls;
+    PlainArray<int> array;
+    array.setSource(std::make_unique<ReluctantItems>(calls, /*sound*/ false));
+    EXPECT_THROW(static_cast<void>(array.data()), std::runtime_error);
+
+    EXPECT_EQ(array.count(), 0);
+    array.add(1);
+    EXPECT_THAT(std::vector<int>(array.begin(), array.end()), ElementsAre(1));
+}
+
+TEST(LateItems, AreNotReadToBeCleared) {
+    Calls calls;
+    PlainArray<int> array;
+    array.setSource(std::make_unique<ReluctantItems>(calls));
+    array.clear();
+
+    EXPECT_TRUE(calls.gone);
+    EXPECT_EQ(array.count(), 0);
 }
 
 class InflatedBytesTest : public testing::Test {

@@ -1,0 +1,58 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+#include "geometry/StoredItems.h"
+
+#include <algorithm>
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+namespace {
+
+/// How many items are kept at hand while they are read in order: an eighth, of long arrays less, but enough that asking
+/// the system costs nothing beside them.
+int windowSize(int count, std::size_t itemBytes) {
+    constexpr std::size_t kMostBytes = std::size_t{1} << 18;
+    return std::min(count / 8 + 2, static_cast<int>(kMostBytes / itemBytes));
+}
+
+} // namespace
+
+StoredWindow::~StoredWindow() {
+    if (mBytes)
+        releaseUpTo(mCount);
+}
+
+/// Releases the items up to an index, those before the window for the second time: they may share a page with others.
+void StoredWindow::releaseUpTo(int end) {
+    constexpr std::size_t kLargestPage = std::size_t{1} << 16;
+    const std::size_t start = static_cast<std::size_t>(mWindowStart) * mItemBytes;
+    const std::size_t from = start - std::min(start, kLargestPage);
+    mBytes->release(mBytes->bytes().subspan(from, static_cast<std::size_t>(end) * mItemBytes - from));
+}
+
+// An index a little behind the window moves it along, so that half of it lies on either side of the index. The first
+// index starts over. With any other one there is no order, and everything stays at hand from then on.
+//
+// The last item is in the window only when it has been asked for: then most of the others are released with it.
+void StoredWindow::moveWindow(int index) {
+    const int size = windowSize(mCount, mItemBytes);
+    const int end = mWindowStart + mWindowSize;
+    int start = 0;
+    if (index >= end && index - end < size / 2) {
+        start = std::max(mWindowStart, index - size / 2);
+        releaseUpTo(start);
+    } else {
+        mBytes->restore();
+    }
+    const int last = mCount - 1;
+    const bool ordered = start > 0 || index < size;
+    const int count = !ordered || index == last ? mCount - start : std::min(size, last - start);
+    mWindowSize = 0; // should the source fail
+    mWindow = mBytes->look(mBytes->bytes().subspan(static_cast<std::size_t>(start) * mItemBytes,
+                                                   static_cast<std::size_t>(count) * mItemBytes));
+    mWindowStart = start;
+    mWindowSize = count;
+}
+
+} // namespace detail
+FBXSDK_NAMESPACE_END

@@ -1,0 +1,56 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Items that are shown as the packed bytes of a file. Whoever reads them more or less in order sees them through a
+// window that moves along, and what lies before it takes no memory any more.
+#pragma once
+
+#include <fbxsdk/FbxPlainArray.h>
+
+#include "geometry/StoredBytes.h"
+
+FBXSDK_NAMESPACE_BEGIN
+namespace detail {
+
+/// The window over the bytes; knows nothing of the items' type but their size.
+class StoredWindow : public ItemSource {
+public:
+    StoredWindow(int count, std::size_t itemBytes) : mCount(count), mItemBytes(itemBytes) {}
+    ~StoredWindow() override;
+
+    [[nodiscard]] int count() const override { return mCount; }
+
+protected:
+    [[nodiscard]] bool hasBytes() const { return mBytes != nullptr; }
+    void setBytes(std::unique_ptr<StoredBytes> bytes) { mBytes = std::move(bytes); }
+    void moveWindow(int index) override;
+
+private:
+    void releaseUpTo(int end);
+
+    std::unique_ptr<StoredBytes> mBytes;
+    int mCount;
+    std::size_t mItemBytes;
+};
+
+template <class Item>
+class StoredItems : public StoredWindow {
+public:
+    explicit StoredItems(int count) : StoredWindow(count, kStoredBytes<Item>) {}
+    StoredItems(std::unique_ptr<StoredBytes> bytes, int count) : StoredItems(count) { setBytes(std::move(bytes)); }
+
+    [[nodiscard]] std::size_t itemSize() const override { return sizeof(Item); }
+    [[nodiscard]] bool show() override { return hasBytes(); }
+    [[nodiscard]] bool read(void* items) override {
+        auto* const to = static_cast<Item*>(items);
+        for (int i = 0; i < count(); ++i) {
+            Item item{};
+            std::memcpy(static_cast<void*>(&item), at(i, kStoredBytes<Item>), kStoredBytes<Item>);
+            to[i] = item;
+        }
+        return true;
+    }
+};
+
+} // namespace detail
+FBXSDK_NAMESPACE_END
