@@ -2,7 +2,6 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Keys for writing.
-#include "animation/CurveConversion.h"
 
 #include "animation/CurveEvaluation.h"
 

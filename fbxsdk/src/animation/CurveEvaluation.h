@@ -46,5 +46,9 @@ struct CurveCursor {
 /// user key.
 void multiplyValues(CurveKeys& keys, float factor);
 
+/// Tangents that such files have no letter for, automatic ones that are clamped, broken or biased, come out as the
+/// slopes that they have.
+[[nodiscard]] CurveKeys legacyKeys(const CurveKeys& keys);
+
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The mirror of CurveReading and LegacyKeys.
-#include "document/CurveWriting.h"
+#include "document/DocumentSections.h"
 
 #include <algorithm>
 #include <bit>

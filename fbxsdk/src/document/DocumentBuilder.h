@@ -11,6 +11,7 @@
 #include <string_view>
 #include <vector>
 
+#include "container/Record.h"
 #include "document/Document.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -99,6 +100,11 @@ struct ConnectionEnds {
 void readGeneration7(DocumentBuilder& builder);
 void readGeneration6(DocumentBuilder& builder);
 bool readGeneration5(DocumentBuilder& builder, FbxStatus& status);
+
+/// False, with the line in the status, when a line of an ASCII file holds more numbers than a value of its type has.
+/// Such files come from programs that spell numbers with the decimal comma of their country: of "35,5" only 35 would be
+/// read, and every number behind it in the wrong place. Properties of users may hold bounds behind the value.
+[[nodiscard]] bool checkValueCounts(const RecordTree& tree, FbxStatus& status);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

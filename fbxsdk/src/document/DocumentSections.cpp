@@ -8,7 +8,6 @@
 #include <optional>
 #include <unordered_map>
 
-#include "document/PropertyWriting.h"
 #include "document/RecordWriting.h"
 
 FBXSDK_NAMESPACE_BEGIN

@@ -4,6 +4,8 @@
 // The parts of a file that are alike in all generations, and the two writers.
 #pragma once
 
+#include <span>
+
 #include "container/RecordSink.h"
 #include "document/Document.h"
 #include "schema/VersionTraits.h"
@@ -33,6 +35,18 @@ void writeTakeTimes(const DocumentTake& take, RecordSink& sink);
 
 void writeGeneration7(const Document& document, const VersionTraits& traits, RecordSink& sink);
 void writeGeneration6(const Document& document, const VersionTraits& traits, RecordSink& sink);
+
+/// The records of an AnimationCurve: packed arrays.
+void writeCurve(RecordSink& sink, const VersionTraits& traits, const CurveKeys& curve);
+
+/// The records of a channel of a take: one list of keys. Automatic tangents with a bias, a break or a clamp have no
+/// letter in it; they must be user tangents by now.
+void writeLegacyCurve(RecordSink& sink, const VersionTraits& traits, const CurveKeys& curve, double defaultValue);
+
+/// `Properties70 { P: name, type, subtype, flags, values }`.
+void writeProperties70(RecordSink& sink, std::span<const DocumentProperty> properties);
+/// `Property: name, type, flags, values` as lines of `Properties60`.
+void writeProperty60(RecordSink& sink, const DocumentProperty& property, std::string_view flags);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

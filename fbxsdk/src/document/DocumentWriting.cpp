@@ -3,7 +3,7 @@
 //
 // Which generation is written, and what becomes of parts that it keeps elsewhere.
 #include "document/DocumentSections.h"
-#include "document/legacy/InlineShapeWriting.h"
+#include "document/legacy/InlineShapes.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

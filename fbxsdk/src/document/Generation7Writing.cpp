@@ -5,9 +5,7 @@
 #include <algorithm>
 #include <numeric>
 
-#include "document/CurveWriting.h"
 #include "document/DocumentSections.h"
-#include "document/PropertyWriting.h"
 #include "document/RecordWriting.h"
 
 FBXSDK_NAMESPACE_BEGIN

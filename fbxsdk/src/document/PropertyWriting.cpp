@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The first type string of a property decides how its values are stored. Simple readers do not convert.
-#include "document/PropertyWriting.h"
+#include "document/DocumentSections.h"
 
 #include <algorithm>
 #include <iterator>

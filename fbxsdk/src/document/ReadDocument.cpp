@@ -7,7 +7,6 @@
 #include "container/FileFormat.h"
 #include "document/DocumentBuilder.h"
 #include "document/FileTicks.h"
-#include "document/ValueCounts.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The property lines of ASCII files, held against the table of their types.
-#include "document/ValueCounts.h"
+#include "document/DocumentBuilder.h"
 
 #include <algorithm>
 #include <iterator>

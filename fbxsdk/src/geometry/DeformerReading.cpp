@@ -3,7 +3,7 @@
 //
 // Skins, clusters and blend shape channels. A cluster's file says where the deformed geometry's node stood as seen from
 // the link; objects say where it stood in the world.
-#include "geometry/DeformerReading.h"
+#include "geometry/GeometryReading.h"
 
 #include <algorithm>
 #include <array>

@@ -8,7 +8,6 @@
 
 #include "geometry/GeometryReading.h"
 #include "geometry/ItemReading.h"
-#include "geometry/LayerReading.h"
 #include "geometry/tessellation/TessellationMesh.h"
 #include "object/ManagerData.h"
 #include "schema/Schema.h"

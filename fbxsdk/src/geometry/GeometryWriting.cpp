@@ -8,7 +8,6 @@
 #include <vector>
 
 #include "document/RecordWriting.h"
-#include "geometry/NurbsWriting.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {

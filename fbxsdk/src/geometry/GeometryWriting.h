@@ -29,5 +29,10 @@ void writeDeformerRecords(FbxObject& deformer, const VersionTraits& traits, Reco
 void writeWithLayers(std::vector<RecordSink::Part> parts, const FbxLayerContainer& container, bool hasEdges,
                      const VersionTraits& traits, RecordSink& sink, bool atOnce);
 
+/// NURBS surfaces and curves, trimmed surfaces, boundaries, patches and lines; nothing for other classes.
+void writeNurbsRecords(FbxGeometryBase& geometry, RecordSink& sink);
+/// What stands behind the layers of a geometry, if its class has any such records.
+void writeRecordsBehindLayers(const FbxGeometryBase& geometry, RecordSink& sink);
+
 } // namespace detail
 FBXSDK_NAMESPACE_END

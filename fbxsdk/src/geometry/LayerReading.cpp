@@ -10,7 +10,7 @@
 //
 // Elements that no layer names go to the layer of their number. Elements that say nothing sound about their mapping,
 // and such without data, are left out.
-#include "geometry/LayerReading.h"
+#include "geometry/GeometryReading.h"
 
 #include <algorithm>
 #include <map>

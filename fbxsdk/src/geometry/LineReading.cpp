@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Records of polylines.
-#include "geometry/LineReading.h"
+#include "geometry/GeometryReading.h"
 
 #include <algorithm>
 

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Surfaces, curves and lines: the mirror of NurbsReading, PatchReading and LineReading.
-#include "geometry/NurbsWriting.h"
+#include "geometry/GeometryWriting.h"
 
 #include <span>
 #include <string_view>

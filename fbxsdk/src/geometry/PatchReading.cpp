@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Records of patches.
-#include "geometry/PatchReading.h"
+#include "geometry/GeometryReading.h"
 
 #include <algorithm>
 #include <string_view>

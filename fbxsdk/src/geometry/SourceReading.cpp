@@ -9,10 +9,7 @@
 #include <fbxsdk/FbxTrimNurbsSurface.h>
 
 #include "geometry/GeometryReading.h"
-#include "geometry/LayerReading.h"
-#include "geometry/LineReading.h"
 #include "geometry/NurbsReading.h"
-#include "geometry/PatchReading.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace {

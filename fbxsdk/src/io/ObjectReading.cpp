@@ -3,7 +3,7 @@
 //
 // Objects of a document, class by class. The class table gives the class and its properties; the rows below give what
 // a class keeps outside its properties.
-#include "io/ObjectReading.h"
+#include "io/SceneReading.h"
 
 #include <algorithm>
 #include <string>
@@ -20,9 +20,7 @@
 #include <fbxsdk/FbxSurfaceMaterial.h>
 #include <fbxsdk/FbxTexture.h>
 
-#include "geometry/DeformerReading.h"
 #include "geometry/GeometryReading.h"
-#include "io/PropertyReading.h"
 #include "io/SchemaClass.h"
 #include "object/ManagerData.h"
 #include "schema/Spellings.h"

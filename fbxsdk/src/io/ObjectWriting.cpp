@@ -3,7 +3,7 @@
 //
 // Objects of a scene, class by class. The class table gives names and properties; the rows below give the records that
 // a class has besides.
-#include "io/ObjectWriting.h"
+#include "io/SceneWriting.h"
 
 #include <algorithm>
 #include <cstring>
@@ -26,10 +26,9 @@
 #include <fbxsdk/FbxTexture.h>
 #include <fbxsdk/FbxVideo.h>
 
-#include "animation/CurveConversion.h"
+#include "animation/CurveEvaluation.h"
 #include "document/RecordWriting.h"
 #include "geometry/GeometryWriting.h"
-#include "io/PropertyWriting.h"
 #include "object/SceneMembers.h"
 #include "schema/Spellings.h"
 

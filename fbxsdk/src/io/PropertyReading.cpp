@@ -3,7 +3,7 @@
 //
 // Properties are matched by name alone: type strings vary between writers and change when a property becomes
 // animatable.
-#include "io/PropertyReading.h"
+#include "io/SceneReading.h"
 
 #include <algorithm>
 #include <string>

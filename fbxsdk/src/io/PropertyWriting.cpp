@@ -3,7 +3,7 @@
 //
 // The mirror of PropertyReading. The flag that a property may be animated changes the spelling of its type: files call
 // what can be animated "Number" where they call what cannot "double".
-#include "io/PropertyWriting.h"
+#include "io/SceneWriting.h"
 
 #include <algorithm>
 #include <string>

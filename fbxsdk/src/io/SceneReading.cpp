@@ -15,8 +15,6 @@
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
 
-#include "io/ObjectReading.h"
-#include "io/PropertyReading.h"
 #include "object/SceneMembers.h"
 #include "scene/MissingTimes.h"
 #include "scene/SceneData.h"

@@ -17,8 +17,6 @@
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
 
-#include "io/ObjectWriting.h"
-#include "io/PropertyWriting.h"
 #include "object/SceneMembers.h"
 #include "scene/IdleCurveNode.h"
 #include "scene/SceneData.h"

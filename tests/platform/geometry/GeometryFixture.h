@@ -19,7 +19,6 @@
 #include <fbxsdk/FbxScene.h>
 
 #include "document/Document.h"
-#include "geometry/DeformerReading.h"
 #include "geometry/GeometryReading.h"
 
 class GeometryFixture : public testing::Test {

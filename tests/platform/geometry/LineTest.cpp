@@ -5,7 +5,7 @@
 #include <fbxsdk/FbxLine.h>
 
 #include "NurbsSamples.h"
-#include "geometry/LineReading.h"
+#include "geometry/GeometryReading.h"
 #include "platform/scene/SceneFixture.h"
 
 namespace fbxsdk::detail {

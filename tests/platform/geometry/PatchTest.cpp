@@ -5,7 +5,7 @@
 #include <fbxsdk/FbxPatch.h>
 
 #include "NurbsSamples.h"
-#include "geometry/PatchReading.h"
+#include "geometry/GeometryReading.h"
 #include "platform/scene/SceneFixture.h"
 
 namespace fbxsdk::detail {

@@ -7,10 +7,8 @@
 #include <unordered_map>
 
 #include "document/SameRecords.h"
-#include "document/legacy/LegacyAttributes.h"
-#include "document/legacy/LegacyGeometry.h"
 #include "document/legacy/LegacyObjects.h"
-#include "document/legacy/LegacySettings.h"
+#include "document/legacy/LegacyRecords.h"
 #include "document/legacy/LegacyTakes.h"
 
 FBXSDK_NAMESPACE_BEGIN

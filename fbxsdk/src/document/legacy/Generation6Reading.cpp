@@ -8,7 +8,7 @@
 #include "document/PropertyNames.h"
 #include "document/SameRecords.h"
 #include "document/legacy/LegacyObjects.h"
-#include "document/legacy/LegacySettings.h"
+#include "document/legacy/LegacyRecords.h"
 #include "document/legacy/LegacyTakes.h"
 #include "schema/PropertyFlags.h"
 #include "schema/PropertyTypes.h"

@@ -7,10 +7,8 @@
 
 #include "document/DocumentSections.h"
 #include "document/PropertyNames.h"
-#include "document/PropertyWriting.h"
 #include "document/RecordWriting.h"
 #include "document/legacy/LegacyLayout.h"
-#include "document/legacy/TakeWriting.h"
 #include "schema/OldNames.h"
 #include "schema/PropertyFlags.h"
 

@@ -2,7 +2,6 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // From a chain of deformers to Shape records inside a geometry.
-#include "document/legacy/InlineShapeWriting.h"
 
 #include <algorithm>
 #include <set>

@@ -1,13 +1,15 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Blend shapes of files up to 7.1 stand inside the geometry; they become deformers, as later files have them.
+// Blend shapes of files up to 7.1 stand inside the geometry: they become deformers, as later files have them, and the
+// other way round.
 #pragma once
 
 #include <cstdint>
 #include <string_view>
 #include <vector>
 
+#include "document/Document.h"
 #include "document/DocumentBuilder.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -29,6 +31,11 @@ void setShapeWeight(DocumentBuilder& builder, DocumentObject& channel, std::span
 
 /// Does so for every geometry of a 7.x document and leads the weights' animation to the channels.
 void translateInlineShapes(DocumentBuilder& builder);
+
+/// Replaces the chain of deformers below each geometry by Shape records in the geometry, and the channels' weights by
+/// properties of it. Of a channel with several targets the last one stays, which is reached at the full weight: there
+/// is no place for the others.
+void moveShapesInline(Document& document);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

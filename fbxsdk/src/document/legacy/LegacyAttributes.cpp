@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Tables from records to properties.
-#include "document/legacy/LegacyAttributes.h"
+#include "document/legacy/LegacyRecords.h"
 
 #include <algorithm>
 

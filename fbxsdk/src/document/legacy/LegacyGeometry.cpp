@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // From plain arrays beside the vertices to layer elements.
-#include "document/legacy/LegacyGeometry.h"
+#include "document/legacy/LegacyRecords.h"
 
 #include <algorithm>
 

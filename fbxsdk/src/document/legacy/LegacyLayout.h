@@ -57,5 +57,8 @@ private:
     std::unordered_map<std::int64_t, std::vector<const DocumentConnection*>> mDriving;
 };
 
+/// The section with all takes and their animation.
+void writeLegacyTakes(const LegacyLayout& layout, const VersionTraits& traits, RecordSink& sink);
+
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Tables of the settings records.
-#include "document/legacy/LegacySettings.h"
+#include "document/legacy/LegacyRecords.h"
 
 #include <algorithm>
 #include <charconv>

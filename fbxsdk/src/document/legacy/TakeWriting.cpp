@@ -5,13 +5,12 @@
 //
 //     Model: "Model::x" { Channel: "Transform" { Channel: "T" { Channel: "X" { Default Key … } … } … } Channel: "Roll"
 //     … }
-#include "document/legacy/TakeWriting.h"
+#include "document/legacy/LegacyLayout.h"
 
 #include <algorithm>
 #include <array>
 #include <set>
 
-#include "document/CurveWriting.h"
 #include "document/DocumentSections.h"
 #include "document/PropertyNames.h"
 #include "document/RecordWriting.h"

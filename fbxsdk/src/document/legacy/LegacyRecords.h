@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Node attributes of files before 6.0: their values are plain records, which become properties.
+// What older files keep in records of their own: settings before 7.0, attributes and meshes before 6.0.
 #pragma once
 
 #include <string_view>
@@ -11,6 +11,9 @@
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
+
+/// What stands in Version5 of a 6.x file and at the top level of older ones. Only fills what is not said yet.
+void readLegacySettings(DocumentBuilder& builder, const Record& parent);
 
 /// The kind of attribute a Model record holds, in the spelling of 7.x: "Mesh", "Camera", …; empty for none.
 [[nodiscard]] std::string_view legacyKindOf(const Record& model);
@@ -24,6 +27,10 @@ namespace detail {
 
 /// The properties of a material.
 [[nodiscard]] std::vector<DocumentProperty> legacyMaterialProperties(DocumentBuilder& builder, const Record& material);
+
+/// The geometry that a Model record of a 5.x file holds, with its normals, texture coordinates and material indices as
+/// layer elements. The arrays are shared with the original.
+[[nodiscard]] const Record& layeredGeometry(DocumentBuilder& builder, const Record& model);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END
