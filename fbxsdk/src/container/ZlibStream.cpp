@@ -5,9 +5,12 @@
 #include "container/ZlibStream.h"
 
 #include <algorithm>
+#include <array>
+#include <cstdint>
 #include <cstring>
 #include <memory>
 #include <new>
+#include <vector>
 
 #include <libdeflate.h>
 
@@ -26,27 +29,83 @@ constexpr std::size_t kMostKeptBytes = std::size_t{1} << 18;
 
 namespace {
 
-using Decompressor = std::unique_ptr<libdeflate_decompressor, decltype(&libdeflate_free_decompressor)>;
-
-/// One for each thread that ever inflated something: to make one takes as long as to inflate a short array.
-libdeflate_decompressor* decompressorOfThread() {
-    thread_local Decompressor decompressor(nullptr, &libdeflate_free_decompressor);
-    if (!decompressor) {
-        decompressor.reset(libdeflate_alloc_decompressor());
+/// What a thread inflates with. Curves of one rig have their keys at the same times, and an array of them each: short
+/// arrays that were inflated lately are copied.
+class Inflater {
+public:
+    bool inflate(std::span<const char> stream, std::span<char> destination) {
+        if (destination.size() > kMostRemembered || stream.size() > kMostRemembered) {
+            return inflateAnew(stream, destination);
+        }
+        Kept& kept = find(stream, destination.size());
+        kept.lastUse = ++mUses;
+        if (kept.size != 0) {
+            std::memcpy(destination.data(), kept.bytes.data() + stream.size(), destination.size());
+            return true;
+        }
+        if (!inflateAnew(stream, destination)) {
+            return false;
+        }
+        remember(kept, stream, destination);
+        return true;
     }
-    return decompressor.get();
-}
+
+private:
+    static constexpr std::size_t kMostRemembered = std::size_t{1} << 13;
+
+    struct Kept {
+        std::vector<char> bytes;    ///< of the stream, and behind it what it holds
+        std::size_t streamSize = 0; ///< of it
+        std::size_t size = 0;       ///< of what it holds; 0: nothing is kept here
+        std::uint64_t lastUse = 0;
+    };
+
+    /// The place of that stream; else the one that was not used for longest, emptied.
+    Kept& find(std::span<const char> stream, std::size_t size) {
+        Kept* oldest = mKept.data();
+        for (Kept& kept : mKept) {
+            if (kept.size == size && kept.streamSize == stream.size() && size != 0 &&
+                std::memcmp(kept.bytes.data(), stream.data(), stream.size()) == 0) {
+                return kept;
+            }
+            oldest = kept.lastUse < oldest->lastUse ? &kept : oldest;
+        }
+        oldest->size = 0;
+        return *oldest;
+    }
+
+    static void remember(Kept& kept, std::span<const char> stream, std::span<const char> content) {
+        kept.bytes.clear();
+        kept.bytes.reserve(stream.size() + content.size());
+        kept.bytes.insert(kept.bytes.end(), stream.begin(), stream.end());
+        kept.bytes.insert(kept.bytes.end(), content.begin(), content.end());
+        kept.streamSize = stream.size();
+        kept.size = content.size();
+    }
+
+    bool inflateAnew(std::span<const char> stream, std::span<char> destination) {
+        if (!mDecompressor) {
+            mDecompressor.reset(libdeflate_alloc_decompressor());
+        }
+        if (!mDecompressor) {
+            throw std::bad_alloc(); // says nothing about the stream
+        }
+        // Without a place for the actual size the library insists on the exact one.
+        return libdeflate_zlib_decompress(mDecompressor.get(), stream.data(), stream.size(), destination.data(),
+                                          destination.size(), nullptr) == LIBDEFLATE_SUCCESS;
+    }
+
+    std::unique_ptr<libdeflate_decompressor, decltype(&libdeflate_free_decompressor)> mDecompressor{
+        nullptr, &libdeflate_free_decompressor};
+    std::array<Kept, 8> mKept;
+    std::uint64_t mUses = 0;
+};
 
 } // namespace
 
 bool inflateExactly(std::span<const char> stream, std::span<char> destination) {
-    libdeflate_decompressor* const decompressor = decompressorOfThread();
-    if (decompressor == nullptr) {
-        throw std::bad_alloc(); // says nothing about the stream
-    }
-    // Without a place for the actual size the library insists on the exact one.
-    return libdeflate_zlib_decompress(decompressor, stream.data(), stream.size(), destination.data(),
-                                      destination.size(), nullptr) == LIBDEFLATE_SUCCESS;
+    thread_local Inflater inflater;
+    return inflater.inflate(stream, destination);
 }
 
 struct Deflater::Compressor {

@@ -1,0 +1,74 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// Streams in and out. Short ones that came lately are remembered, which nobody must notice.
+#include "container/ZlibStream.h"
+
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+namespace {
+
+using namespace fbxsdk::detail;
+
+std::string contentOf(int number, std::size_t size = 1000) {
+    std::string content(size, 'a');
+    for (std::size_t i = 0; i < content.size(); ++i)
+        content[i] = static_cast<char>('a' + (i / 16 + static_cast<std::size_t>(number)) % 20);
+    return content;
+}
+
+std::string streamOf(const std::string& content) {
+    Deflater deflater;
+    const auto stream = deflater.deflated(content);
+    return {stream.begin(), stream.end()};
+}
+
+/// Empty when the stream is damaged.
+std::string inflated(const std::string& stream, std::size_t size) {
+    std::string content(size, '?');
+    return inflateExactly(stream, content) ? content : "";
+}
+
+TEST(ZlibStream, GivesEachOfManyStreamsItsContentHoweverOften) {
+    std::vector<std::string> contents, streams;
+    for (int i = 0; i < 20; ++i) {
+        contents.push_back(contentOf(i));
+        streams.push_back(streamOf(contents.back()));
+    }
+    for (const std::size_t step : {1U, 0U, 3U, 7U}) {
+        for (std::size_t i = 0; i < 60; ++i) {
+            const std::size_t number = i * step % streams.size();
+            ASSERT_EQ(inflated(streams[number], 1000), contents[number]);
+        }
+    }
+}
+
+TEST(ZlibStream, RefusesADamagedStreamBesideASoundOne) {
+    const std::string content = contentOf(1), stream = streamOf(content);
+    ASSERT_EQ(inflated(stream, content.size()), content);
+    std::string damaged = stream;
+    damaged.back() = static_cast<char>(damaged.back() ^ 1);
+    for (int i = 0; i < 3; ++i) {
+        EXPECT_EQ(inflated(damaged, content.size()), "");
+        EXPECT_EQ(inflated(stream, content.size()), content);
+    }
+}
+
+TEST(ZlibStream, RefusesAnotherSizeThanTheStreamHas) {
+    const std::string content = contentOf(1), stream = streamOf(content);
+    ASSERT_EQ(inflated(stream, content.size()), content);
+    EXPECT_EQ(inflated(stream, content.size() - 1), "");
+    EXPECT_EQ(inflated(stream, content.size() + 1), "");
+    EXPECT_EQ(inflated(stream, content.size()), content);
+}
+
+TEST(ZlibStream, InflatesLongStreams) {
+    const std::string content = contentOf(1, 1'000'000), stream = streamOf(content);
+    EXPECT_EQ(inflated(stream, content.size()), content);
+    EXPECT_EQ(inflated(stream, content.size()), content);
+}
+
+} // namespace
