@@ -10,8 +10,10 @@
 FBXSDK_NAMESPACE_BEGIN
 
 namespace detail {
-struct CurveCursor;
 struct CurveKeys;
+struct CurveState;
+struct Document;
+struct DocumentObject;
 } // namespace detail
 
 /// How a key leads to the next one. The interpolation, tangents and weights of a segment of the curve are those of the
@@ -206,13 +208,18 @@ public:
     virtual void SetValue(float pValue, int pCurveNodeIndex = 0);
 
     /// The platform's own view of the keys.
-    [[nodiscard]] const detail::CurveKeys& keys() const { return *mKeys; }
+    [[nodiscard]] const detail::CurveKeys& keys() const;
     /// The same for changing them: what was evaluated before is forgotten.
     [[nodiscard]] detail::CurveKeys& editKeys();
+    /// The keys are those of an object of a file, read when somebody asks for the first time.
+    void setSource(std::shared_ptr<const detail::Document> document, const detail::DocumentObject& object);
 
 private:
-    std::unique_ptr<detail::CurveKeys> mKeys;
-    std::unique_ptr<detail::CurveCursor> mCursor;
+    [[nodiscard]] detail::CurveState& state() const;
+
+    mutable std::unique_ptr<detail::CurveState> mState; ///< null until somebody asks
+    mutable std::shared_ptr<const detail::Document> mDocument;
+    const detail::DocumentObject* mSource = nullptr; ///< of the document, while there is one
 };
 
 FBXSDK_NAMESPACE_END

@@ -10,6 +10,7 @@
 #include <fbxsdk/FbxAnimCurveNode.h>
 
 #include "animation/CurveEvaluation.h"
+#include "document/Document.h"
 #include "object/ManagerData.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -20,9 +21,7 @@ FBXSDK_OBJECT_IMPLEMENT(FbxAnimCurve, FbxAnimCurveBase, std::span<const detail::
 FbxAnimCurveBase::FbxAnimCurveBase(FbxManager& pManager, const detail::ClassInfo& pInfo) : FbxObject(pManager, pInfo) {}
 FbxAnimCurveBase::~FbxAnimCurveBase() = default;
 
-FbxAnimCurve::FbxAnimCurve(FbxManager& pManager, const detail::ClassInfo& pInfo)
-    : FbxAnimCurveBase(pManager, pInfo), mKeys(std::make_unique<detail::CurveKeys>()),
-      mCursor(std::make_unique<detail::CurveCursor>()) {}
+FbxAnimCurve::FbxAnimCurve(FbxManager& pManager, const detail::ClassInfo& pInfo) : FbxAnimCurveBase(pManager, pInfo) {}
 FbxAnimCurve::~FbxAnimCurve() = default;
 
 namespace {
@@ -72,19 +71,45 @@ bool isConstant(const detail::KeyAttributes& attributes) {
 
 } // namespace
 
+struct detail::CurveState {
+    CurveKeys keys;
+    CurveCursor cursor;
+};
+
+void FbxAnimCurve::setSource(std::shared_ptr<const detail::Document> document, const detail::DocumentObject& object) {
+    ++GetFbxManager()->data().revision;
+    mState.reset();
+    mDocument = std::move(document);
+    mSource = &object;
+}
+
+detail::CurveState& FbxAnimCurve::state() const {
+    if (!mState) {
+        auto read = std::make_unique<detail::CurveState>();
+        if (mDocument)
+            read->keys = detail::readCurve(*mDocument, *mSource);
+        mDocument.reset();
+        mState = std::move(read);
+    }
+    return *mState;
+}
+
+const detail::CurveKeys& FbxAnimCurve::keys() const { return state().keys; }
+
 detail::CurveKeys& FbxAnimCurve::editKeys() {
     ++GetFbxManager()->data().revision;
-    *mCursor = {};
-    return *mKeys;
+    state().cursor = {};
+    return state().keys;
 }
 
 void FbxAnimCurve::KeyModifyBegin() {}
 
 void FbxAnimCurve::KeyModifyEnd() {
     // No more keys for now: the lists give back what they grew by.
-    mKeys->times.shrink_to_fit();
-    mKeys->values.shrink_to_fit();
-    mKeys->attributeOfKey.shrink_to_fit();
+    detail::CurveKeys& keys = state().keys;
+    keys.times.shrink_to_fit();
+    keys.values.shrink_to_fit();
+    keys.attributeOfKey.shrink_to_fit();
 }
 
 void FbxAnimCurve::KeyClear() {
@@ -95,7 +120,7 @@ void FbxAnimCurve::KeyClear() {
     keys.attributeOfKey.clear();
 }
 
-int FbxAnimCurve::KeyGetCount() const { return static_cast<int>(mKeys->keyCount()); }
+int FbxAnimCurve::KeyGetCount() const { return static_cast<int>(keys().keyCount()); }
 
 int FbxAnimCurve::KeyAdd(FbxTime pTime, int* pLast) {
     detail::CurveKeys& keys = editKeys();
@@ -118,7 +143,7 @@ int FbxAnimCurve::KeyAdd(FbxTime pTime, int* pLast) {
 }
 
 bool FbxAnimCurve::KeyRemove(int pIndex) {
-    if (!hasKey(*mKeys, pIndex))
+    if (!hasKey(keys(), pIndex))
         return false;
     detail::CurveKeys& keys = editKeys();
     keys.times.erase(keys.times.begin() + pIndex);
@@ -128,22 +153,23 @@ bool FbxAnimCurve::KeyRemove(int pIndex) {
 }
 
 FbxTime FbxAnimCurve::KeyGetTime(int pKeyIndex) const {
-    return hasKey(*mKeys, pKeyIndex) ? FbxTime(mKeys->times[static_cast<std::size_t>(pKeyIndex)]) : FbxTime();
+    return hasKey(keys(), pKeyIndex) ? FbxTime(keys().times[static_cast<std::size_t>(pKeyIndex)]) : FbxTime();
 }
 
 void FbxAnimCurve::KeySetTime(int pKeyIndex, FbxTime pTime) {
-    if (hasKey(*mKeys, pKeyIndex))
+    if (hasKey(keys(), pKeyIndex))
         moveKey(editKeys(), static_cast<std::size_t>(pKeyIndex), pTime.Get());
 }
 
 float FbxAnimCurve::Evaluate(FbxTime pTime, int* pLast) {
-    if (mKeys->keyCount() == 0)
+    auto& [keys, cursor] = state();
+    if (keys.keyCount() == 0)
         return GetValue(0);
     if (pLast)
-        mCursor->segment = static_cast<std::size_t>(std::max(*pLast, 0));
-    const float value = detail::evaluate(*mKeys, pTime.Get(), mCursor.get());
+        cursor.segment = static_cast<std::size_t>(std::max(*pLast, 0));
+    const float value = detail::evaluate(keys, pTime.Get(), &cursor);
     if (pLast)
-        *pLast = static_cast<int>(mCursor->segment);
+        *pLast = static_cast<int>(cursor.segment);
     return value;
 }
 
@@ -160,29 +186,29 @@ std::int64_t ticksBetween(std::int64_t from, std::int64_t to, double part) {
 } // namespace
 
 float FbxAnimCurve::EvaluateIndex(double pIndex) {
-    const std::size_t count = mKeys->keyCount();
+    const std::size_t count = keys().keyCount();
     if (count == 0)
         return GetValue(0);
     if (!(pIndex > 0.0))
-        return mKeys->values.front();
+        return keys().values.front();
     if (pIndex >= static_cast<double>(count - 1))
-        return mKeys->values[count - 1];
+        return keys().values[count - 1];
     const auto key = static_cast<std::size_t>(pIndex);
-    return detail::evaluate(*mKeys,
-                            ticksBetween(mKeys->times[key], mKeys->times[key + 1], pIndex - static_cast<double>(key)));
+    return detail::evaluate(keys(),
+                            ticksBetween(keys().times[key], keys().times[key + 1], pIndex - static_cast<double>(key)));
 }
 
 void FbxAnimCurve::SetPreExtrapolation(EExtrapolationType pExtrapolation) {
     editKeys().before.type = static_cast<detail::ExtrapolationType>(pExtrapolation);
 }
 FbxAnimCurveBase::EExtrapolationType FbxAnimCurve::GetPreExtrapolation() const {
-    return static_cast<EExtrapolationType>(mKeys->before.type);
+    return static_cast<EExtrapolationType>(keys().before.type);
 }
 void FbxAnimCurve::SetPostExtrapolation(EExtrapolationType pExtrapolation) {
     editKeys().after.type = static_cast<detail::ExtrapolationType>(pExtrapolation);
 }
 FbxAnimCurveBase::EExtrapolationType FbxAnimCurve::GetPostExtrapolation() const {
-    return static_cast<EExtrapolationType>(mKeys->after.type);
+    return static_cast<EExtrapolationType>(keys().after.type);
 }
 
 namespace {
@@ -196,14 +222,14 @@ unsigned long fromCount(std::int32_t count) { return count > 0 ? static_cast<uns
 } // namespace
 
 void FbxAnimCurve::SetPreExtrapolationCount(unsigned long pCount) { editKeys().before.count = toCount(pCount); }
-unsigned long FbxAnimCurve::GetPreExtrapolationCount() const { return fromCount(mKeys->before.count); }
+unsigned long FbxAnimCurve::GetPreExtrapolationCount() const { return fromCount(keys().before.count); }
 void FbxAnimCurve::SetPostExtrapolationCount(unsigned long pCount) { editKeys().after.count = toCount(pCount); }
-unsigned long FbxAnimCurve::GetPostExtrapolationCount() const { return fromCount(mKeys->after.count); }
+unsigned long FbxAnimCurve::GetPostExtrapolationCount() const { return fromCount(keys().after.count); }
 
 bool FbxAnimCurve::GetTimeInterval(FbxTimeSpan& pTimeInterval) const {
-    if (mKeys->keyCount() == 0)
+    if (keys().keyCount() == 0)
         return false;
-    pTimeInterval.Set(FbxTime(mKeys->times.front()), FbxTime(mKeys->times[mKeys->keyCount() - 1]));
+    pTimeInterval.Set(FbxTime(keys().times.front()), FbxTime(keys().times[keys().keyCount() - 1]));
     return true;
 }
 
@@ -212,7 +238,7 @@ void FbxAnimCurve::KeySet(int pKeyIndex, FbxTime pTime, float pValue,
                           FbxAnimCurveDef::ETangentMode pTangentMode, float pData0, float pData1,
                           FbxAnimCurveDef::EWeightedMode pTangentWeightMode, float pWeight0, float pWeight1,
                           float pVelocity0, float pVelocity1) {
-    if (!hasKey(*mKeys, pKeyIndex))
+    if (!hasKey(keys(), pKeyIndex))
         return;
     detail::CurveKeys& keys = editKeys();
     const auto index = static_cast<std::size_t>(pKeyIndex);
@@ -230,23 +256,23 @@ void FbxAnimCurve::KeySet(int pKeyIndex, FbxTime pTime, float pValue,
 }
 
 float FbxAnimCurve::KeyGetValue(int pKeyIndex) const {
-    return hasKey(*mKeys, pKeyIndex) ? mKeys->values[static_cast<std::size_t>(pKeyIndex)] : 0.0F;
+    return hasKey(keys(), pKeyIndex) ? keys().values[static_cast<std::size_t>(pKeyIndex)] : 0.0F;
 }
 
 void FbxAnimCurve::KeySetValue(int pKeyIndex, float pValue) {
-    if (hasKey(*mKeys, pKeyIndex))
+    if (hasKey(keys(), pKeyIndex))
         editKeys().values[static_cast<std::size_t>(pKeyIndex)] = pValue;
 }
 
 FbxAnimCurveDef::EInterpolationType FbxAnimCurve::KeyGetInterpolation(int pKeyIndex) const {
-    const std::uint32_t bits = attributesOf(*mKeys, pKeyIndex).flags & kInterpolationBits;
+    const std::uint32_t bits = attributesOf(keys(), pKeyIndex).flags & kInterpolationBits;
     return static_cast<FbxAnimCurveDef::EInterpolationType>(bits);
 }
 
 void FbxAnimCurve::KeySetInterpolation(int pKeyIndex, FbxAnimCurveDef::EInterpolationType pInterpolation) {
-    if (!hasKey(*mKeys, pKeyIndex))
+    if (!hasKey(keys(), pKeyIndex))
         return;
-    detail::KeyAttributes attributes = attributesOf(*mKeys, pKeyIndex);
+    detail::KeyAttributes attributes = attributesOf(keys(), pKeyIndex);
     const bool becomesConstant = pInterpolation == FbxAnimCurveDef::eInterpolationConstant;
     if (isConstant(attributes) != becomesConstant)
         attributes.flags = (attributes.flags & ~kModeBits) | (becomesConstant ? 0U : detail::KeyFlag::tangentAuto);
@@ -255,41 +281,41 @@ void FbxAnimCurve::KeySetInterpolation(int pKeyIndex, FbxAnimCurveDef::EInterpol
 }
 
 FbxAnimCurveDef::EConstantMode FbxAnimCurve::KeyGetConstantMode(int pKeyIndex) const {
-    const detail::KeyAttributes& attributes = attributesOf(*mKeys, pKeyIndex);
+    const detail::KeyAttributes& attributes = attributesOf(keys(), pKeyIndex);
     const bool next = isConstant(attributes) && (attributes.flags & detail::KeyFlag::constantNext) != 0;
     return next ? FbxAnimCurveDef::eConstantNext : FbxAnimCurveDef::eConstantStandard;
 }
 
 void FbxAnimCurve::KeySetConstantMode(int pKeyIndex, FbxAnimCurveDef::EConstantMode pMode) {
-    if (!hasKey(*mKeys, pKeyIndex) || !isConstant(attributesOf(*mKeys, pKeyIndex)))
+    if (!hasKey(keys(), pKeyIndex) || !isConstant(attributesOf(keys(), pKeyIndex)))
         return;
-    detail::KeyAttributes attributes = attributesOf(*mKeys, pKeyIndex);
+    detail::KeyAttributes attributes = attributesOf(keys(), pKeyIndex);
     attributes.flags = (attributes.flags & ~detail::KeyFlag::constantNext) | static_cast<std::uint32_t>(pMode);
     editKeys().setAttributes(static_cast<std::size_t>(pKeyIndex), attributes);
 }
 
 FbxAnimCurveDef::ETangentMode FbxAnimCurve::KeyGetTangentMode(int pKeyIndex) const {
-    const detail::KeyAttributes& attributes = attributesOf(*mKeys, pKeyIndex);
+    const detail::KeyAttributes& attributes = attributesOf(keys(), pKeyIndex);
     return isConstant(attributes) ? FbxAnimCurveDef::eTangentAuto
                                   : static_cast<FbxAnimCurveDef::ETangentMode>(attributes.flags & kModeBits);
 }
 
 void FbxAnimCurve::KeySetTangentMode(int pKeyIndex, FbxAnimCurveDef::ETangentMode pTangent) {
-    if (!hasKey(*mKeys, pKeyIndex) || isConstant(attributesOf(*mKeys, pKeyIndex)))
+    if (!hasKey(keys(), pKeyIndex) || isConstant(attributesOf(keys(), pKeyIndex)))
         return;
-    detail::KeyAttributes attributes = attributesOf(*mKeys, pKeyIndex);
+    detail::KeyAttributes attributes = attributesOf(keys(), pKeyIndex);
     attributes.flags = (attributes.flags & ~kModeBits) | static_cast<std::uint32_t>(pTangent);
     editKeys().setAttributes(static_cast<std::size_t>(pKeyIndex), attributes);
 }
 
 float FbxAnimCurve::KeyGetData(int pKeyIndex, FbxAnimCurveDef::EDataIndex pIndex) const {
-    const auto& data = attributesOf(*mKeys, pKeyIndex).data;
+    const auto& data = attributesOf(keys(), pKeyIndex).data;
     return static_cast<std::size_t>(pIndex) < data.size() ? data[static_cast<std::size_t>(pIndex)] : 0.0F;
 }
 
 void FbxAnimCurve::KeySetData(int pKeyIndex, FbxAnimCurveDef::EDataIndex pIndex, float pValue) {
-    detail::KeyAttributes attributes = attributesOf(*mKeys, pKeyIndex);
-    if (!hasKey(*mKeys, pKeyIndex) || static_cast<std::size_t>(pIndex) >= attributes.data.size())
+    detail::KeyAttributes attributes = attributesOf(keys(), pKeyIndex);
+    if (!hasKey(keys(), pKeyIndex) || static_cast<std::size_t>(pIndex) >= attributes.data.size())
         return;
     attributes.data[static_cast<std::size_t>(pIndex)] = pValue;
     editKeys().setAttributes(static_cast<std::size_t>(pKeyIndex), attributes);
@@ -320,7 +346,7 @@ Channel channelOf(const FbxAnimCurve& curve, int curveNodeIndex) {
 
 float FbxAnimCurve::GetValue(int pCurveNodeIndex) const {
     const Channel channel = channelOf(*this, pCurveNodeIndex);
-    return channel.node ? static_cast<float>(channel.node->channelValue(channel.index)) : mKeys->defaultValue;
+    return channel.node ? static_cast<float>(channel.node->channelValue(channel.index)) : keys().defaultValue;
 }
 
 void FbxAnimCurve::SetValue(float pValue, int pCurveNodeIndex) {

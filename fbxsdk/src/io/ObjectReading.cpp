@@ -3,7 +3,7 @@
 //
 // Objects of a document, class by class. The class table gives the class and its properties; the rows below give what
 // a class keeps outside its properties.
-#include "io/SceneReading.h"
+#include "io/ObjectReading.h"
 
 #include <algorithm>
 #include <string>
@@ -90,9 +90,7 @@ void readCurveNode(const Reading& reading) {
     }
 }
 
-void readCurveKeys(const Reading& reading) {
-    reading.as<FbxAnimCurve>().editKeys() = readCurve(*reading.document, reading.source);
-}
+void readCurveKeys(const Reading& reading) { reading.as<FbxAnimCurve>().setSource(reading.document, reading.source); }
 
 void readMaterial(const Reading& reading) {
     const std::string model = textOf(reading.record("ShadingModel"));
@@ -151,37 +149,50 @@ FbxClassId materialClass(const DocumentObject& source) {
     return FbxSurfaceMaterial::ClassId;
 }
 
-FbxClassId classOf(const DocumentObject& source) {
+} // namespace
+
+ObjectReader::ObjectReader(std::shared_ptr<const Document> document, FbxScene& scene)
+    : mDocument(std::move(document)), mScene(scene) {}
+ObjectReader::~ObjectReader() = default;
+
+FbxClassId ObjectReader::classOf(const DocumentObject& source) {
     if (source.record == "Material")
         return materialClass(source);
-    const SchemaClass* schema = findSchema(source.record, source.subClass);
-    return schema ? schema->classId() : FbxClassId();
+    if (source.record != mLastRecord || source.subClass != mLastSubClass || mLastRecord.empty()) {
+        mLastSchema = findSchema(source.record, source.subClass);
+        mLastRecord = source.record;
+        mLastSubClass = source.subClass;
+    }
+    return mLastSchema ? mLastSchema->classId() : FbxClassId();
 }
 
-void readTemplates(const Document& document, FbxObject& object) {
-    for (const DocumentTemplate& each : document.templates) {
+void ObjectReader::readTemplates(FbxObject& object) {
+    const auto [known, isNew] = mTemplates.try_emplace(object.GetClassId().info());
+    if (!isNew) {
+        applyTemplate(object, known->second);
+        return;
+    }
+    for (const DocumentTemplate& each : mDocument->templates) {
         if (each.className == object.GetClassId().GetName())
-            readTemplate(object, each.properties);
+            readTemplate(object, each.properties, known->second);
     }
 }
 
-} // namespace
-
-FbxObject* readObject(const std::shared_ptr<const Document>& document, const DocumentObject& source, FbxScene& scene) {
+FbxObject* ObjectReader::read(const DocumentObject& source) {
     const FbxClassId id = classOf(source);
     if (!id.IsValid())
         return nullptr;
-    FbxObject* object = ManagerData::createObject(&scene, id, std::string(source.name).c_str());
+    FbxObject* object = ManagerData::createObject(&mScene, id, std::string(source.name).c_str());
     if (!object)
         return nullptr;
     object->data().fileId = source.id;
-    readTemplates(*document, *object);
+    readTemplates(*object);
     // The channels of curve nodes are no properties.
     if (!object->Is<FbxAnimCurveNode>())
         readProperties(*object, source.properties);
     for (const ClassReader& reader : kReaders) {
         if (id.Is(reader.id))
-            reader.read({document, source, *object});
+            reader.read({mDocument, source, *object});
     }
     return object;
 }

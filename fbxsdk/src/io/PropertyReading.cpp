@@ -3,7 +3,7 @@
 //
 // Properties are matched by name alone: type strings vary between writers and change when a property becomes
 // animatable.
-#include "io/SceneReading.h"
+#include "io/ObjectReading.h"
 
 #include <algorithm>
 #include <string>
@@ -76,34 +76,45 @@ bool isDefault(const FbxObject& object, int index, const DocumentProperty& line)
     return true;
 }
 
-void readProperty(FbxObject& object, const DocumentProperty& line, bool appendUnknown) {
-    const int index = object.data().findProperty(line.name);
-    if (index >= 0) {
-        if (isDefault(object, index, line))
-            return;
-        FbxProperty property(&object, index);
-        setValue(property, line);
-        setFlags(property, line.flags);
-        return;
-    }
-    if (!appendUnknown || line.name.empty())
-        return;
-    FbxProperty property = FbxProperty::Create(&object, dataTypeOf(line.typeName, line.subTypeName),
-                                               std::string(line.name).c_str(), "", /*pCheckForDup=*/false);
+void set(FbxProperty property, const DocumentProperty& line) {
     setValue(property, line);
     setFlags(property, line.flags);
+}
+
+void readProperty(FbxObject& object, const DocumentProperty& line) {
+    const int index = object.data().findProperty(line.name);
+    if (index >= 0) {
+        if (!isDefault(object, index, line))
+            set({&object, index}, line);
+        return;
+    }
+    if (line.name.empty())
+        return;
+    const FbxProperty property = FbxProperty::Create(&object, dataTypeOf(line.typeName, line.subTypeName),
+                                                     std::string(line.name).c_str(), "", /*pCheckForDup=*/false);
+    set(property, line);
 }
 
 } // namespace
 
 void readProperties(FbxObject& object, std::span<const DocumentProperty> properties) {
     for (const DocumentProperty& line : properties)
-        readProperty(object, line, /*appendUnknown=*/true);
+        readProperty(object, line);
 }
 
-void readTemplate(FbxObject& object, std::span<const DocumentProperty> properties) {
-    for (const DocumentProperty& line : properties)
-        readProperty(object, line, /*appendUnknown=*/false);
+void readTemplate(FbxObject& object, std::span<const DocumentProperty> properties, std::vector<TemplateLine>& lines) {
+    for (const DocumentProperty& line : properties) {
+        const int index = object.data().findProperty(line.name);
+        if (index < 0 || isDefault(object, index, line))
+            continue;
+        set({&object, index}, line);
+        lines.push_back({index, &line});
+    }
+}
+
+void applyTemplate(FbxObject& object, std::span<const TemplateLine> lines) {
+    for (const auto& [index, line] : lines)
+        set({&object, index}, *line);
 }
 
 } // namespace detail

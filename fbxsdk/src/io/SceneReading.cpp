@@ -15,6 +15,7 @@
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
 
+#include "io/ObjectReading.h"
 #include "object/SceneMembers.h"
 #include "scene/MissingTimes.h"
 #include "scene/SceneData.h"
@@ -166,8 +167,9 @@ bool readScene(const std::shared_ptr<const Document>& document, FbxScene& scene,
     readSettings(*document, scene);
     ObjectTable objects;
     objects.reserve(document->objects.size());
+    ObjectReader objectReader(document, scene);
     for (const DocumentObject& source : document->objects)
-        objects.push_back(readObject(document, source, scene));
+        objects.push_back(objectReader.read(source));
     ConnectionReader reader(*document, objects, scene);
     for (const DocumentConnection& connection : document->connections)
         reader.read(connection);

@@ -146,11 +146,15 @@ void FbxProperty::readValue(void* pValue, EFbxType pType) const {
 bool FbxProperty::writeValue(const void* pValue, EFbxType pType) {
     if (!exists(*this))
         return false;
-    const PropertyData* stored = dataOf(*this);
-    detail::PropertyValue value = stored ? stored->value : detail::defaultValue(*rowOf(*this));
-    if (!detail::writePropertyValue(value, GetPropertyDataType().GetType(), pValue, pType))
-        return false;
-    editable(*this).value = std::move(value);
+    if (PropertyData* stored = mObject->data().property(mIndex)) {
+        if (!detail::writePropertyValue(stored->value, stored->type.GetType(), pValue, pType))
+            return false;
+    } else {
+        detail::PropertyValue value = detail::defaultValue(*rowOf(*this));
+        if (!detail::writePropertyValue(value, rowOf(*this)->type->GetType(), pValue, pType))
+            return false;
+        editable(*this).value = std::move(value);
+    }
     ++mObject->GetFbxManager()->data().revision;
     return true;
 }

@@ -5,10 +5,12 @@
 #include "object/ObjectData.h"
 
 #include <algorithm>
-#include <cstring>
+#include <new>
 
 #include "object/ManagerData.h"
+#include "object/RowIndex.h"
 #include "schema/PropertyFlags.h"
+#include "schema/Schema.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -21,7 +23,17 @@ bool equalNames(std::string_view a, std::string_view b, bool caseSensitive) {
     return std::equal(a.begin(), a.end(), b.begin(), b.end(), [&](char x, char y) { return lower(x) == lower(y); });
 }
 
+int anyCaseRow(std::span<const PropertyRow> rows, std::string_view name) {
+    for (std::size_t i = 0; i < rows.size(); ++i) {
+        if (equalNames(rows[i].name, name, /*caseSensitive*/ false))
+            return static_cast<int>(i);
+    }
+    return -1;
+}
+
 void noteChange(const FbxObject& object) { ++object.GetFbxManager()->data().revision; }
+
+static_assert(kCameraStereoRows.size() <= RowIndex::kMostRows, "no class has more");
 
 /// So many dynamic properties are searched one by one; more get an index.
 constexpr std::size_t kUnindexedProperties = 32;
@@ -32,11 +44,21 @@ bool betweenObjects(const ConnectionPoint& source, const ConnectionPoint& destin
 
 } // namespace
 
-int ObjectData::findProperty(std::string_view propertyName, bool caseSensitive) const {
-    for (std::size_t i = 0; i < info->rows.size(); ++i) {
-        if (equalNames(info->rows[i].name, propertyName, caseSensitive))
-            return static_cast<int>(i);
+int ClassInfo::findRow(std::string_view rowName) const {
+    const RowIndex* known = index.load(std::memory_order_acquire);
+    if (!known) {
+        // Several threads may be here at once: one of their tables stays.
+        std::unique_ptr<const RowIndex> made(new (std::nothrow) RowIndex(rows));
+        if (!made)
+            return rowIndex(rows, rowName);
+        known = index.compare_exchange_strong(known, made.get()) ? made.release() : known;
     }
+    return known->find(rowName);
+}
+
+int ObjectData::findProperty(std::string_view propertyName, bool caseSensitive) const {
+    if (const int row = caseSensitive ? info->findRow(propertyName) : anyCaseRow(info->rows, propertyName); row >= 0)
+        return row;
     if (dynamicIndex && caseSensitive) {
         const auto found = dynamicIndex->find(propertyName);
         return found == dynamicIndex->end() ? -1 : found->second;

@@ -9,6 +9,7 @@
 #pragma once
 
 #include <array>
+#include <atomic>
 #include <memory>
 #include <span>
 #include <string>
@@ -24,6 +25,8 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+class RowIndex;
+
 /// One class of objects. The rows are the whole list of the class, inherited ones included, in file order.
 struct ClassInfo {
     const char* name; ///< "FbxNode"
@@ -31,6 +34,11 @@ struct ClassInfo {
     std::span<const PropertyRow> rows;
     /// Makes an object of the class; null for abstract classes.
     FbxObject* (*construct)(FbxManager& manager, const ClassInfo& info) = nullptr;
+    /// Made at the first question, and kept for good.
+    mutable std::atomic<const RowIndex*> index = nullptr;
+
+    /// The place of the row of that name; -1 when there is none.
+    [[nodiscard]] int findRow(std::string_view rowName) const;
 };
 
 /// One end of connections: an object, or one of its properties.

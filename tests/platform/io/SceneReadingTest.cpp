@@ -6,6 +6,7 @@
 #include <memory>
 #include <string>
 
+#include <fbxsdk/FbxAnimCurve.h>
 #include <fbxsdk/FbxCamera.h>
 #include <fbxsdk/FbxLight.h>
 #include <fbxsdk/FbxMarker.h>
@@ -145,6 +146,27 @@ TEST_F(SceneReadingTest, TakesTheFilesOwnDefaultsBeforeTheBuiltInOnes) {
     EXPECT_EQ(child(1)->LclScaling.Get(), FbxDouble3(1, 1, 1)); // the built-in default, said against the file's
 }
 
+TEST_F(SceneReadingTest, TakesTheLastOfTheFilesOwnDefaultsForEveryObject) {
+    read(R"(
+        Definitions: { ObjectType: "Model" { PropertyTemplate: "FbxNode" { Properties70: {
+            P: "Lcl Scaling", "Lcl Scaling", "", "A",2,2,2
+            P: "Lcl Translation", "Lcl Translation", "", "A",7,8,9
+            P: "Lcl Scaling", "Lcl Scaling", "", "A",1,1,1
+        } } } }
+        Objects: { )" +
+         model(1, "a", R"(P: "Lcl Translation", "Lcl Translation", "", "A",1,2,3)") + model(2, "b") + model(3, "c") +
+         R"( }
+        Connections: { C: "OO",1,0
+                       C: "OO",2,0
+                       C: "OO",3,0 })");
+
+    EXPECT_EQ(child(0)->LclTranslation.Get(), FbxDouble3(1, 2, 3));
+    for (int i = 1; i < 3; ++i)
+        EXPECT_EQ(child(i)->LclTranslation.Get(), FbxDouble3(7, 8, 9));
+    for (int i = 0; i < 3; ++i)
+        EXPECT_EQ(child(i)->LclScaling.Get(), FbxDouble3(1, 1, 1));
+}
+
 TEST_F(SceneReadingTest, PutsRotationsInForceWhereAFileHasNoWordForIt) {
     read(model(1, "a"), "C: \"OO\",1,0");
     EXPECT_TRUE(child()->GetRotationActive());
@@ -166,6 +188,31 @@ TEST_F(SceneReadingTest, ConnectsTargetsTexturesAndMaterials) {
     auto* texture = child(0)->GetMaterial(0)->FindProperty("DiffuseColor").GetSrcObject<FbxFileTexture>();
     ASSERT_NE(texture, nullptr);
     EXPECT_STREQ(texture->GetFileName(), "/a/b.png");
+}
+
+TEST_F(SceneReadingTest, ReadsTheKeysOfACurveAlsoWhenItsSceneIsGone) {
+    read(curve(1, 3, 5), "");
+    auto* late = scene->GetSrcObject<FbxAnimCurve>();
+    ASSERT_NE(late, nullptr);
+    scene->DisconnectSrcObject(late);
+    scene->Destroy();
+    scene = nullptr;
+
+    ASSERT_EQ(late->KeyGetCount(), 2);
+    EXPECT_EQ(late->KeyGetValue(0), 3.0F);
+    EXPECT_EQ(late->Evaluate(seconds(1)), 5.0F);
+}
+
+TEST_F(SceneReadingTest, ChangesTheKeysOfACurveThatNobodyHasAskedFor) {
+    read(curve(1, 3, 5), "");
+    auto* changed = scene->GetSrcObject<FbxAnimCurve>();
+    ASSERT_NE(changed, nullptr);
+    EXPECT_EQ(changed->KeyAdd(seconds(0.5)), 1);
+    changed->KeySetValue(1, -1.0F);
+
+    ASSERT_EQ(changed->KeyGetCount(), 3);
+    EXPECT_EQ(changed->KeyGetValue(2), 5.0F);
+    EXPECT_EQ(changed->Evaluate(seconds(0.5)), -1.0F);
 }
 
 TEST_F(SceneReadingTest, PutsCurvesIntoTheirChannels) {
