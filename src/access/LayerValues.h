@@ -54,6 +54,11 @@ public:
         return values;
     }
 
+    /// The values themselves where no index stands before them and there are at least so many; else null.
+    const fbxsdk::FbxLayerElementArrayTemplate<Value>* inOrder(int count) const {
+        return mIndex == nullptr && mDirect != nullptr && mDirect->GetCount() >= count ? mDirect : nullptr;
+    }
+
     std::optional<Value> at(int position) const {
         if (mIndex != nullptr) {
             if (position < 0 || position >= mIndex->GetCount()) {

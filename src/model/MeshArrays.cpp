@@ -4,15 +4,31 @@
 // All memory is found before the first array is filled: when there is too little, the mesh is still empty.
 #include "MeshArrays.h"
 
+#include <sys/mman.h>
+
 namespace Tarnell::Fbx::detail {
 
 namespace {
 
 constexpr char kSet = 1; // its address stands for a flag that is set
 
+/// Memory that will soon be filled as a whole takes large pages, where the system has some: most of the time of small
+/// ones goes into getting them one by one.
+void preferLargePages(void* memory, std::size_t size) {
+    constexpr std::uintptr_t largePage = std::uintptr_t{1} << 21U;
+    const auto address = reinterpret_cast<std::uintptr_t>(memory);
+    const std::uintptr_t first = (address + largePage - 1) / largePage * largePage;
+    const std::uintptr_t end = (address + size) / largePage * largePage;
+    if (first < end) {
+        ::madvise(static_cast<char*>(memory) + (first - address), end - first, MADV_HUGEPAGE);
+    }
+}
+
 template <typename Element>
 void reserveExactly(SharedArray<Element>& array, std::size_t count) {
-    array.own().reserve(count);
+    std::vector<Element>& elements = array.own();
+    elements.reserve(count);
+    preferLargePages(elements.data(), elements.capacity() * sizeof(Element));
 }
 
 /// Elements up to a count that memory was reserved for; those that are there already stay.

@@ -16,6 +16,9 @@ namespace Tarnell::Fbx::detail {
 /// its memory when it is asked for, or else in the end.
 class MeshArrays {
 public:
+    using Vector = TnFbxMesh::Vector;
+    using TextureCoordinate = TnFbxMesh::TextureCoordinate;
+
     explicit MeshArrays(TnFbxMesh& mesh) : mMesh(mesh) {}
     MeshArrays(const MeshArrays&) = delete;
     MeshArrays& operator=(const MeshArrays&) = delete;
@@ -53,11 +56,17 @@ public:
     // have the defaults in the end.
     void addNormal(const TnFbxMesh::Vector& normal) { mMesh.mGeometry.normals.own().push_back(normal); }
     void addUV(const TnFbxMesh::TextureCoordinate& uv) { mMesh.mGeometry.uvs.own().push_back(uv); }
+    void addNormals(const Vector* normals, std::size_t count) { append(mMesh.mGeometry.normals.own(), normals, count); }
+    void addUVs(const TextureCoordinate* uvs, std::size_t count) { append(mMesh.mGeometry.uvs.own(), uvs, count); }
 
     /// What the destructor does: defaults for all that was not asked for or added.
     void complete();
 
 private:
+    template <typename Element>
+    static void append(std::vector<Element>& array, const Element* elements, std::size_t count) {
+        array.insert(array.end(), elements, elements + count);
+    }
     std::size_t polygonVertexCount() const;
     void addFirstSet(int controlPoints);
     void completeColours();

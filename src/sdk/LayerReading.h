@@ -22,6 +22,12 @@ public:
     CornerValues(fbxsdk::FbxLayerElement::EMappingMode mapping, const ElementValues<Value>& values)
         : mByControlPoint(mapping == fbxsdk::FbxLayerElement::eByControlPoint), mValues(values) {}
 
+    /// The array that has a value for each of the first `count` corners, in order, where it is as simple as that; else
+    /// null.
+    const fbxsdk::FbxLayerElementArrayTemplate<Value>* inOrder(int count) const {
+        return mByControlPoint ? nullptr : mValues.inOrder(count);
+    }
+
     std::optional<Value> at(const Corner& corner) const {
         return mValues.at(mByControlPoint ? corner.controlPoint : corner.polygonVertex);
     }

@@ -14,10 +14,12 @@
 #include "model/MeshArrays.h"
 #include "model/MeshInstances.h"
 
+#include <algorithm>
 #include <array>
 #include <limits>
 #include <memory>
 #include <string>
+#include <utility>
 
 namespace Tarnell::Fbx {
 
@@ -79,8 +81,10 @@ void fillLayout(const fbxsdk::FbxMesh& source, MeshArrays& arrays) {
         const int size = source.GetPolygonSize(polygon);
         const int start = source.GetPolygonVertexIndex(polygon);
         *sizes++ = size;
-        for (int vertex = 0; vertex < size; ++vertex) {
-            *pointIndex++ = vertices != nullptr && start >= 0 ? vertices[start + vertex] : -1;
+        if (vertices != nullptr && start >= 0) {
+            pointIndex = std::copy_n(vertices + start, size, pointIndex);
+        } else {
+            pointIndex = std::fill_n(pointIndex, size, -1);
         }
     }
 }
@@ -98,39 +102,74 @@ void forEachCorner(const MeshArrays& arrays, int polygonCount, Visit&& visit) {
     }
 }
 
-/// The normals of a layer; whether it has any.
-bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const fbxsdk::FbxAMatrix* bake,
-                 MeshArrays& arrays) {
-    const detail::CornerValues<fbxsdk::FbxVector4> stored = detail::layerNormals(layer);
-    const fbxsdk::FbxVector4 missing(static_cast<double>(TnFbxMesh::kDefaultMeshNX),
-                                     static_cast<double>(TnFbxMesh::kDefaultMeshNY),
-                                     static_cast<double>(TnFbxMesh::kDefaultMeshNZ));
-    bool found = false;
-    forEachCorner(arrays, source.GetPolygonCount(), [&](const Corner& corner) {
-        const std::optional<fbxsdk::FbxVector4> value = stored.at(corner);
-        found = found || value.has_value();
-        fbxsdk::FbxVector4 normal = value.value_or(missing);
-        if (bake != nullptr) {
-            normal = bake->MultT(normal);
+/// Elements on their way to an array: it is asked for room once for all of a block.
+template <class Element>
+class Block {
+public:
+    bool isFull() const { return mCount == mElements.size(); }
+    void add(const Element& element) { mElements[mCount++] = element; }
+    const Element* data() const { return mElements.data(); }
+    std::size_t takeCount() { return std::exchange(mCount, 0); }
+
+private:
+    std::array<Element, 512> mElements{};
+    std::size_t mCount = 0;
+};
+
+/// Hands on what `convert` makes of each corner's value, or of the one for corners that have none; whether any has.
+template <class Element, class Value, class Convert, class HandOn>
+bool convertCorners(const detail::CornerValues<Value>& stored, const Value& missing, int cornerCount, int polygonCount,
+                    MeshArrays& arrays, const Convert& convert, const HandOn& handOn) {
+    Block<Element> block;
+    const auto add = [&](const Value& value) {
+        if (block.isFull()) {
+            handOn(block.data(), block.takeCount());
         }
-        arrays.addNormal({toFloat(normal[0]), toFloat(normal[1]), toFloat(normal[2])});
-    });
+        block.add(convert(value));
+    };
+    bool found = false;
+    if (const auto* const values = stored.inOrder(cornerCount)) { // what most files have
+        for (int i = 0; i < cornerCount; ++i) {
+            add(values->GetAt(i));
+        }
+        found = cornerCount > 0;
+    } else {
+        forEachCorner(arrays, polygonCount, [&](const Corner& corner) {
+            const std::optional<Value> value = stored.at(corner);
+            found = found || value.has_value();
+            add(value.value_or(missing));
+        });
+    }
+    handOn(block.data(), block.takeCount());
     return found;
 }
 
+/// The normals of a layer; whether it has any.
+bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const fbxsdk::FbxAMatrix* bake,
+                 int cornerCount, MeshArrays& arrays) {
+    const fbxsdk::FbxVector4 missing(static_cast<double>(TnFbxMesh::kDefaultMeshNX),
+                                     static_cast<double>(TnFbxMesh::kDefaultMeshNY),
+                                     static_cast<double>(TnFbxMesh::kDefaultMeshNZ));
+    const auto convert = [bake](const fbxsdk::FbxVector4& stored) {
+        const fbxsdk::FbxVector4 normal = bake != nullptr ? bake->MultT(stored) : stored;
+        return MeshArrays::Vector{toFloat(normal[0]), toFloat(normal[1]), toFloat(normal[2])};
+    };
+    return convertCorners<MeshArrays::Vector>(
+        detail::layerNormals(layer), missing, cornerCount, source.GetPolygonCount(), arrays, convert,
+        [&arrays](const MeshArrays::Vector* normals, std::size_t count) { arrays.addNormals(normals, count); });
+}
+
 /// The texture coordinates of a layer; whether it has any.
-bool fillUVs(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, MeshArrays& arrays) {
-    const detail::CornerValues<fbxsdk::FbxVector2> stored = detail::layerUVs(layer);
+bool fillUVs(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, int cornerCount, MeshArrays& arrays) {
+    using Coordinate = MeshArrays::TextureCoordinate;
     const fbxsdk::FbxVector2 missing(static_cast<double>(TnFbxMesh::kDefaultMeshU),
                                      static_cast<double>(TnFbxMesh::kDefaultMeshV));
-    bool found = false;
-    forEachCorner(arrays, source.GetPolygonCount(), [&](const Corner& corner) {
-        const std::optional<fbxsdk::FbxVector2> value = stored.at(corner);
-        found = found || value.has_value();
-        const fbxsdk::FbxVector2 uv = value.value_or(missing);
-        arrays.addUV({toFloat(uv[0]), toFloat(uv[1])});
-    });
-    return found;
+    return convertCorners<Coordinate>(
+        detail::layerUVs(layer), missing, cornerCount, source.GetPolygonCount(), arrays,
+        [](const fbxsdk::FbxVector2& uv) {
+            return Coordinate{toFloat(uv[0]), toFloat(uv[1])};
+        },
+        [&arrays](const Coordinate* uvs, std::size_t count) { arrays.addUVs(uvs, count); });
 }
 
 constexpr detail::Colour kDefaultColour = {TnFbxMesh::kDefaultMeshRed, TnFbxMesh::kDefaultMeshGreen,
@@ -170,8 +209,9 @@ void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, bool i
     }
     bool normals = false, uvs = isAlike && mesh.getValidUVs();
     if (fbxsdk::FbxLayer* first = source.GetLayer(0)) {
-        normals = fillNormals(source, *first, bake, arrays);
-        uvs = isAlike ? uvs : fillUVs(source, *first, arrays);
+        const int cornerCount = mesh.getNumberOfPolygonVertices();
+        normals = fillNormals(source, *first, bake, cornerCount, arrays);
+        uvs = isAlike ? uvs : fillUVs(source, *first, cornerCount, arrays);
     }
     const bool colours = fillColours(source, arrays);
     // At the end: of a mesh that a damaged layer left partly filled, nothing is valid.
