@@ -120,6 +120,13 @@ std::size_t segmentAt(const CurveKeys& keys, std::int64_t ticks, CurveCursor& cu
     return segment;
 }
 
+/// Whether the time lies in the cubic segment of the last one, where most do.
+bool isWithinCubic(const CurveKeys& keys, std::int64_t ticks, const CurveCursor& cursor) {
+    const std::size_t key = cursor.segment;
+    return key == cursor.cubic.key && key + 1 < keys.keyCount() && keys.times[key] < ticks &&
+           ticks < keys.times[key + 1];
+}
+
 double valueWithin(const CurveKeys& keys, std::int64_t ticks, CurveCursor& cursor) {
     const std::size_t key = segmentAt(keys, ticks, cursor);
     const bool between = key + 1 < keys.keyCount() && keys.times[key] < ticks && ticks < keys.times[key + 1];
@@ -207,6 +214,10 @@ double extrapolatedValue(const CurveKeys& keys, std::int64_t ticks, Side side, C
 } // namespace
 
 float evaluate(const CurveKeys& keys, std::int64_t ticks, CurveCursor* cursor) {
+    if (cursor != nullptr && isWithinCubic(keys, ticks, *cursor)) {
+        const std::int64_t start = keys.times[cursor->segment];
+        return toFloat(cubicValue(cursor->cubic, static_cast<double>(ticksBetween(start, ticks))));
+    }
     CurveCursor once;
     CurveCursor& used = cursor != nullptr ? *cursor : once;
     const std::size_t count = keys.keyCount();

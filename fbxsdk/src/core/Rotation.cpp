@@ -111,11 +111,34 @@ void completeAxes(Axes& axes, std::array<bool, 3> missing) {
     }
 }
 
+/// A number of right angles, and what is left, in -45 to 45 degrees; exact but for the sign of a zero, as std::remquo.
+struct RightAngles {
+    int count; ///< its lower bits at least
+    double rest;
+};
+
+RightAngles rightAnglesIn(double degrees) {
+    constexpr double kMost = 1.0e9; // further out the product of a count is not exact, or the count no int
+    if (!(std::abs(degrees) < kMost)) {
+        int count = 0;
+        const double rest = std::remquo(degrees, 90.0, &count);
+        return {count, rest};
+    }
+    // Adding and taking away what leaves no room for fractions rounds to the nearest whole number, halves to even ones.
+    constexpr double kNoFractions = 6755399441055744.0; // 3 · 2⁵¹
+    double count = degrees / 90.0 + kNoFractions - kNoFractions;
+    double rest = degrees - count * 90.0;
+    if (std::abs(rest) > 45.0) { // the quotient was rounded to a half
+        count += std::copysign(1.0, rest);
+        rest = degrees - count * 90.0;
+    }
+    return {static_cast<int>(count), rest};
+}
+
 } // namespace
 
 SinCos sinCosDegrees(double degrees) {
-    int quadrant = 0;
-    const double rest = std::remquo(degrees, 90.0, &quadrant); // exact, in -45 to 45
+    const auto [quadrant, rest] = rightAnglesIn(degrees);
     const double radians = rest * FBXSDK_PI_DIV_180;
     const double s = std::sin(radians);
     const double c = std::cos(radians);
