@@ -62,7 +62,7 @@ TEST_F(WriteWarnings, NameARateThatIsNone) {
     const std::pair<float, const char*> rates[] = {{0.0f, "0 "}, {-24.0f, "-24 "}, {kNaN, "nan "}, {kInfinity, "inf "}};
     for (const auto& [rate, text] : rates) {
         info.setFPS(rate);
-        EXPECT_THAT(warnings(), ElementsAre(AllOf(StartsWith(text), HasSubstr("no rate"))));
+        EXPECT_THAT(warnings(), ElementsAre(AllOf(StartsWith(text), HasSubstr("not a valid rate"))));
     }
 }
 

@@ -89,7 +89,7 @@ public:
     double pixelAspect = 1.0;
     int aspectMode = 0;
     bool resolutionStated = false; ///< false: the resolution is what the format assumes
-    double pictureAspect = 0.0; ///< 0 where the file has no resolution: the picture is the film
+    double pictureAspect = 0.0;    ///< 0 where the file has no resolution: the picture is the film
     GateFit gateFit = GateFit::none;
     Vector3 scale{1.0, 1.0, 1.0}; ///< of the camera in the file's world
     std::string target;           ///< name of the node that it looks at

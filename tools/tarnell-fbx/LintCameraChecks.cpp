@@ -73,9 +73,9 @@ void filmShapeDiffers(const LintContext& context, LintReport& report) {
             report.add(camera.name, shapes + "none leaves open which angle is kept");
             continue;
         }
-        report.add(camera.name, shapes + gateFitName(camera.gateFit) + " makes " + inDecimals(moment.fovX, 3) + "° × " + inDecimals(moment.fovY, 3) +
-                                    "° into " + inDecimals(moment.pictureFovX, 3) + "° × " +
-                                    inDecimals(moment.pictureFovY, 3) + "°");
+        report.add(camera.name, shapes + gateFitName(camera.gateFit) + " makes " + inDecimals(moment.fovX, 3) + "° × " +
+                                    inDecimals(moment.fovY, 3) + "° into " + inDecimals(moment.pictureFovX, 3) +
+                                    "° × " + inDecimals(moment.pictureFovY, 3) + "°");
     }
 }
 

@@ -185,7 +185,8 @@ void cacheRate(const LintContext& context, LintReport& report) {
         constexpr double kTolerance = 0.02;
         if (readFacts(used, facts) && facts.frameRate > 0.0 &&
             std::abs(facts.frameRate - context.first.frameRate) > kTolerance)
-            report.add(nameOf(*used.mesh), rateText(facts.frameRate) + ", and the file has " + rateText(context.first.frameRate));
+            report.add(nameOf(*used.mesh),
+                       rateText(facts.frameRate) + ", and the file has " + rateText(context.first.frameRate));
     });
 }
 
