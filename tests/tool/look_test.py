@@ -222,6 +222,13 @@ class Usage(unittest.TestCase):
             result = run("dump", "--sample-fps", rate, SHOT)
             self.assertEqual((result.returncode, result.stdout), (2, ""), rate)
 
+    def test_take_and_stack_are_one_option(self):
+        file = os.path.join(SDK_DATA, "two_stacks_7400_ascii.fbx")
+        for command in (["camera", file], ["curve", file, "node"], ["dump", "--faithful", file]):
+            take, stack = (run(*command, option, "run") for option in ("--take", "--stack"))
+            self.assertEqual((take.returncode, take.stdout), (0, stack.stdout), command)
+            self.assertNotEqual(take.stdout, run(*command).stdout, command)
+
     def test_a_name_that_there_is_not_is_an_error(self):
         result = run("dump", "--name", "nosuch", SHOT)
         self.assertEqual((result.returncode, result.stdout), (1, ""))

@@ -75,7 +75,7 @@ void addFiles(CLI::App& command, LookOptions& options, const char* help) {
 }
 
 void addTake(CLI::App& command, std::string& take) {
-    command.add_option("--take", take, "The take (animation stack) of that name instead of the first")
+    command.add_option("--take,--stack", take, "The take (animation stack) of that name instead of the first")
         ->type_name("NAME");
 }
 

@@ -83,7 +83,7 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
     dump->add_flag("--pretty", options.pretty, "Indented");
     CLI::Option* faithful =
         dump->add_flag("--faithful", options.faithful, "What the application shows instead of what hosts rely on");
-    dump->add_option("--stack", options.stack, "The animation stack to read (default: the first one)")->needs(faithful);
+    dump->add_option("--take,--stack", options.stack, "The animation stack to read (default: the first one)")->needs(faithful);
 }
 
 void addConvert(CLI::App& app, tool::ConvertOptions& options) {
@@ -115,7 +115,7 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
             },
             "Comma list of cameras, lights, nulls, transforms, meshes (default: all)")
         ->type_name("LIST");
-    convert->add_option("--stack", options.stack, "The animation stack to write (default: the first one)");
+    convert->add_option("--take,--stack", options.stack, "The animation stack to write (default: the first one)");
     tool::addFrames(*convert, options.frames, "Points of meshes at every whole frame of A:B, as point caches");
     convert->add_option("--fps", options.fps, "Sample and write at this many frames per second")
         ->check(refuseUnlessFinite)
