@@ -12,54 +12,70 @@ FBXSDK_NAMESPACE_BEGIN
 
 class FbxNode;
 
-/// Indices and weights that stand in a file are read on the first access; the indices are not checked against the
-/// geometry.
+/// The control points that follow one node, and how strongly. Indices and weights that stand in a file are read on the
+/// first access; the indices are not checked against the geometry.
 class FBXSDK_DLL FbxCluster : public FbxSubDeformer {
     FBXSDK_OBJECT_DECLARE(FbxCluster, FbxSubDeformer)
 
 public:
-    /// How the weights of a point count: brought to a sum of 1; each added on to what the point was; taken as they are,
-    /// with what is missing to 1 staying undeformed.
-    enum ELinkMode { eNormalize, eAdditive, eTotalOne };
+    /// How the weights of a point count.
+    enum ELinkMode {
+        eNormalize, ///< brought to a sum of 1; the default
+        eAdditive,  ///< each added on to what the point was, relative to the associate model
+        eTotalOne   ///< taken as they are, with what is missing to 1 staying undeformed
+    };
 
-    [[nodiscard]] EType GetSubDeformerType() const override;
+    [[nodiscard]] EType GetSubDeformerType() const override; ///< eCluster.
 
-    void SetLinkMode(ELinkMode pMode) { mLinkMode = pMode; }
-    [[nodiscard]] ELinkMode GetLinkMode() const { return mLinkMode; }
+    void SetLinkMode(ELinkMode pMode) { mLinkMode = pMode; }          ///< Any value is stored.
+    [[nodiscard]] ELinkMode GetLinkMode() const { return mLinkMode; } ///< eNormalize by default.
 
-    /// The node that the points follow: the cluster's first source node. Null when there is none.
+    /// Makes it the node that the points follow, in place of any other; null removes it.
     void SetLink(const FbxNode* pNode);
+    /// The node that the points follow: the cluster's first source node. Null when there is none.
     [[nodiscard]] FbxNode* GetLink() { return mLink; }
+    /// The same for a const cluster.
     [[nodiscard]] const FbxNode* GetLink() const { return mLink; }
-    /// The node that additive weights are relative to; null when there is none.
+    /// Makes it the node that additive weights are relative to, in place of any other; null removes it.
     void SetAssociateModel(FbxNode* pNode);
-    [[nodiscard]] FbxNode* GetAssociateModel() const;
+    [[nodiscard]] FbxNode* GetAssociateModel() const; ///< Null when there is none.
 
+    /// Appends a point and its weight; neither is checked, and a point may come again.
     void AddControlPointIndex(int pIndex, double pWeight);
-    [[nodiscard]] int GetControlPointIndicesCount() const;
-    // As many as the count says; null when there are none.
+    [[nodiscard]] int GetControlPointIndicesCount() const; ///< How many points have a weight.
+    /// The points, as many as the count says; null when there are none. Valid until the count changes.
     [[nodiscard]] int* GetControlPointIndices() const;
+    /// Their weights, 0 to 1 mostly; null when there are none. Valid until the count changes.
     [[nodiscard]] double* GetControlPointWeights() const;
 
-    // Global transforms at the time of binding: of the deformed geometry's node, of the link, of the associate model.
-    // The identity when never set.
+    /// The global transform of the deformed geometry's node at the time of binding.
     void SetTransformMatrix(const FbxAMatrix& pMatrix) { mTransform = pMatrix; }
+    /// Sets pMatrix and returns it; the identity when never set. Files hold it relative to the link.
     FbxAMatrix& GetTransformMatrix(FbxAMatrix& pMatrix) const { return pMatrix = mTransform; }
+    /// The global transform of the link at the time of binding.
     void SetTransformLinkMatrix(const FbxAMatrix& pMatrix) { mTransformLink = pMatrix; }
+    /// Sets pMatrix and returns it; the identity when never set.
     FbxAMatrix& GetTransformLinkMatrix(FbxAMatrix& pMatrix) const { return pMatrix = mTransformLink; }
+    /// The global transform of the associate model at the time of binding.
     void SetTransformAssociateModelMatrix(const FbxAMatrix& pMatrix) { mTransformAssociateModel = pMatrix; }
+    /// Sets pMatrix and returns it; the identity when never set.
     FbxAMatrix& GetTransformAssociateModelMatrix(FbxAMatrix& pMatrix) const {
         return pMatrix = mTransformAssociateModel;
     }
+    /// The global transform of the parent at the time of binding; kept in memory, not in files.
     void SetTransformParentMatrix(const FbxAMatrix& pMatrix);
+    /// Sets pMatrix and returns it; the identity when never set.
     FbxAMatrix& GetTransformParentMatrix(FbxAMatrix& pMatrix) const { return pMatrix = mTransformParent; }
+    /// Whether SetTransformParentMatrix was called.
     [[nodiscard]] bool IsTransformParentSet() const { return mTransformParentSet; }
 
     /// The platform's own view: of indices and weights the first ones count, as many as there are of both.
     [[nodiscard]] detail::PlainArray<int>& indices() { return mIndices; }
+    /// The same of the weights.
     [[nodiscard]] detail::PlainArray<double>& weights() { return mWeights; }
 
 protected:
+    /// Keeps the link in step with the connections.
     FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:

@@ -26,7 +26,7 @@ public:
     bool Triangulate(FbxScene* pScene, bool pReplace, bool pLegacy = false);
 
     /// The platform's own: how many surfaces this converter sampled in coarser steps than they ask for, since they ask
-    /// for more than their control points and those of their scene are good for.
+    /// for more samples than their control points and those of their scene allow.
     [[nodiscard]] int coarserSurfaces() const { return mCoarser; }
 
 private:

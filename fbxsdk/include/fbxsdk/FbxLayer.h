@@ -41,20 +41,28 @@ inline FbxColor zeroItem<FbxColor>() {
 }
 } // namespace detail
 
-enum EFbxMemoryClearMode { eClearToZero };
+/// What new items of an array hold.
+enum EFbxMemoryClearMode {
+    eClearToZero ///< all bits zero
+};
 
-/// The part of an element's array that does not depend on its type.
+/// The part of an element's array that does not depend on its type. Arrays belong to their element.
 class FBXSDK_DLL FbxLayerElementArray {
 public:
-    enum ELockMode { eReadLock = 1, eWriteLock = 2, eReadWriteLock = 3 };
+    /// What a pointer to the items is used for; of no effect, as nothing is locked.
+    enum ELockMode {
+        eReadLock = 1,     ///< reading
+        eWriteLock = 2,    ///< writing
+        eReadWriteLock = 3 ///< both
+    };
 
     FbxLayerElementArray(const FbxLayerElementArray&) = delete;
     FbxLayerElementArray& operator=(const FbxLayerElementArray&) = delete;
 
-    [[nodiscard]] int GetCount() const { return mStorage.count(); }
+    [[nodiscard]] int GetCount() const { return mStorage.count(); } ///< How many items there are.
 
 protected:
-    explicit FbxLayerElementArray(detail::PlainStorage& pStorage) : mStorage(pStorage) {}
+    explicit FbxLayerElementArray(detail::PlainStorage& pStorage) : mStorage(pStorage) {} ///< For the array of a type.
     ~FbxLayerElementArray() = default;
 
 private:
@@ -63,12 +71,15 @@ private:
 
 /// A contiguous array of plain items. New items are all zero; an index out of range reads as a zero item and writes
 /// nowhere.
+///
+/// Items of a file stay in it until they are asked for; a file that has been changed since then makes such a call throw
+/// std::runtime_error.
 template <class T>
 class FbxLayerElementArrayTemplate : public FbxLayerElementArray {
 public:
-    FbxLayerElementArrayTemplate() : FbxLayerElementArray(mItems) {}
+    FbxLayerElementArrayTemplate() : FbxLayerElementArray(mItems) {} ///< No items.
 
-    [[nodiscard]] int GetCount() const { return mItems.count(); }
+    [[nodiscard]] int GetCount() const { return mItems.count(); } ///< How many items there are.
     /// Always true; a negative count means none.
     bool SetCount(int pCount, EFbxMemoryClearMode = eClearToZero) {
         mItems.resize(pCount, detail::zeroItem<T>());
@@ -80,7 +91,7 @@ public:
         SetCount(first + std::max(pItemCount, 0));
         return first;
     }
-    void Clear() { mItems.clear(); }
+    void Clear() { mItems.clear(); } ///< Removes all items.
 
     /// The new item's index.
     int Add(T const& pItem) {
@@ -95,17 +106,19 @@ public:
         mItems.insert(index, pItem);
         return index;
     }
+    /// No effect out of range.
     void SetAt(int pIndex, T const& pItem) {
         if (mItems.contains(pIndex))
             mItems[pIndex] = pItem;
     }
-    void SetLast(T const& pItem) { SetAt(GetCount() - 1, pItem); }
+    void SetLast(T const& pItem) { SetAt(GetCount() - 1, pItem); } ///< No effect without items.
 
+    /// A copy; a zero item out of range.
     [[nodiscard]] T GetAt(int pIndex) const {
         return mItems.contains(pIndex) ? mItems.value(pIndex) : detail::zeroItem<T>();
     }
-    [[nodiscard]] T GetFirst() const { return GetAt(0); }
-    [[nodiscard]] T GetLast() const { return GetAt(GetCount() - 1); }
+    [[nodiscard]] T GetFirst() const { return GetAt(0); }             ///< A zero item when there are none.
+    [[nodiscard]] T GetLast() const { return GetAt(GetCount() - 1); } ///< A zero item when there are none.
     /// The removed item; a zero item when there is none at the index.
     T RemoveAt(int pIndex) {
         const T removed = GetAt(pIndex);
@@ -113,7 +126,7 @@ public:
             mItems.remove(pIndex);
         return removed;
     }
-    T RemoveLast() { return RemoveAt(GetCount() - 1); }
+    T RemoveLast() { return RemoveAt(GetCount() - 1); } ///< The removed item; a zero item when there is none.
     /// Removes the first equal item; false when there is none.
     bool RemoveIt(T const& pItem) {
         const int index = Find(pItem);
@@ -121,11 +134,12 @@ public:
             mItems.remove(index);
         return index >= 0;
     }
-    /// -1 when there is none.
+    /// The index of the first equal item; -1 when there is none.
     [[nodiscard]] int Find(T const& pItem) const {
         const T* found = std::find(mItems.begin(), mItems.end(), pItem);
         return found == mItems.end() ? -1 : static_cast<int>(found - mItems.begin());
     }
+    /// Makes pArray hold the same items and no others.
     void CopyTo(FbxArray<T>& pArray) const {
         pArray.Resize(GetCount());
         for (int i = 0; i < GetCount(); ++i)
@@ -135,7 +149,7 @@ public:
     /// Unlike elsewhere the index must be in range.
     T& operator[](int pIndex) const { return mItems[pIndex]; }
 
-    /// All items as one run; null when there are none. Nothing is locked: the pointer is good until the count changes.
+    /// All items as one run; null when there are none. Nothing is locked: the pointer is valid until the count changes.
     [[nodiscard]] T* GetLocked(T* = nullptr, ELockMode = eReadWriteLock) const {
         return GetCount() == 0 ? nullptr : mItems.data();
     }
@@ -152,67 +166,80 @@ private:
     detail::PlainArray<T> mItems;
 };
 
-/// One property of the points, corners or polygons of a geometry. Belongs to its container and lives until Destroy or
-/// the container's end, whether it stands in a layer or not.
+/// One property of the points, corners or polygons of a geometry: values, indices of values, and what they belong to.
+/// Belongs to its container and lives until Destroy or the container's end, whether it is in a layer or not.
 class FBXSDK_DLL FbxLayerElement {
 public:
+    /// What the element is. The numbers are part of the API.
     enum EType {
-        eUnknown,
-        eNormal,
-        eBiNormal,
-        eTangent,
-        eMaterial,
-        ePolygonGroup,
-        eUV,
-        eVertexColor,
-        eSmoothing,
-        eVertexCrease,
-        eEdgeCrease,
-        eHole,
-        eUserData,
-        eVisibility,
-        eTextureDiffuse,
-        eTextureDiffuseFactor,
-        eTextureEmissive,
-        eTextureEmissiveFactor,
-        eTextureAmbient,
-        eTextureAmbientFactor,
-        eTextureSpecular,
-        eTextureSpecularFactor,
-        eTextureShininess,
-        eTextureNormalMap,
-        eTextureBump,
-        eTextureTransparency,
-        eTextureTransparencyFactor,
-        eTextureReflection,
-        eTextureReflectionFactor,
-        eTextureDisplacement,
-        eTextureDisplacementVector,
-        eTypeCount
+        eUnknown,                   ///< none of the others
+        eNormal,                    ///< normals
+        eBiNormal,                  ///< binormals
+        eTangent,                   ///< tangents
+        eMaterial,                  ///< materials
+        ePolygonGroup,              ///< groups of polygons
+        eUV,                        ///< texture coordinates
+        eVertexColor,               ///< colours
+        eSmoothing,                 ///< smoothing groups, or hard and soft edges
+        eVertexCrease,              ///< creases of control points
+        eEdgeCrease,                ///< creases of edges
+        eHole,                      ///< polygons that are holes
+        eUserData,                  ///< of the API; no class here has it
+        eVisibility,                ///< what is shown
+        eTextureDiffuse,            ///< the texture channel of the diffuse colour
+        eTextureDiffuseFactor,      ///< of its factor
+        eTextureEmissive,           ///< of the emitted colour
+        eTextureEmissiveFactor,     ///< of its factor
+        eTextureAmbient,            ///< of the ambient colour
+        eTextureAmbientFactor,      ///< of its factor
+        eTextureSpecular,           ///< of the highlights
+        eTextureSpecularFactor,     ///< of their factor
+        eTextureShininess,          ///< of the exponent of the highlights
+        eTextureNormalMap,          ///< of normals
+        eTextureBump,               ///< of heights
+        eTextureTransparency,       ///< of the transparent colour
+        eTextureTransparencyFactor, ///< of its factor
+        eTextureReflection,         ///< of reflections
+        eTextureReflectionFactor,   ///< of their factor
+        eTextureDisplacement,       ///< of displacements along the normal
+        eTextureDisplacementVector, ///< of displacements in all directions
+        eTypeCount                  ///< how many types there are; none itself
     };
     /// What one value belongs to.
-    enum EMappingMode { eNone, eByControlPoint, eByPolygonVertex, eByPolygon, eByEdge, eAllSame };
-    /// Direct: the n-th value is direct[n]. Index to direct: it is direct[index[n]].
-    enum EReferenceMode { eDirect, eIndex, eIndexToDirect };
+    enum EMappingMode {
+        eNone,            ///< nothing; the value of a new element
+        eByControlPoint,  ///< a control point
+        eByPolygonVertex, ///< a corner of a polygon
+        eByPolygon,       ///< a polygon
+        eByEdge,          ///< an edge
+        eAllSame          ///< everything
+    };
+    /// Where the n-th value is.
+    enum EReferenceMode {
+        eDirect,       ///< direct[n]
+        eIndex,        ///< index[n] itself, for numbers without a direct array
+        eIndexToDirect ///< direct[index[n]]
+    };
 
     FbxLayerElement(const FbxLayerElement&) = delete;
     FbxLayerElement& operator=(const FbxLayerElement&) = delete;
 
-    void SetMappingMode(EMappingMode pMappingMode) { mMappingMode = pMappingMode; }
-    [[nodiscard]] EMappingMode GetMappingMode() const { return mMappingMode; }
+    void SetMappingMode(EMappingMode pMappingMode) { mMappingMode = pMappingMode; } ///< The arrays stay as they are.
+    [[nodiscard]] EMappingMode GetMappingMode() const { return mMappingMode; }      ///< eNone for a new element.
+    /// The arrays stay as they are.
     void SetReferenceMode(EReferenceMode pReferenceMode) { mReferenceMode = pReferenceMode; }
-    [[nodiscard]] EReferenceMode GetReferenceMode() const { return mReferenceMode; }
-    void SetName(const char* pName) { mName = pName ? pName : ""; }
-    [[nodiscard]] const char* GetName() const { return mName.c_str(); }
+    [[nodiscard]] EReferenceMode GetReferenceMode() const { return mReferenceMode; } ///< eDirect for a new element.
+    void SetName(const char* pName) { mName = pName ? pName : ""; }                  ///< UTF-8; null is the empty name.
+    [[nodiscard]] const char* GetName() const { return mName.c_str(); } ///< Never null; valid until the name changes.
 
     /// Takes the element out of its layers and frees it.
     void Destroy();
 
 protected:
-    FBXSDK_LOCAL FbxLayerElement();
+    FBXSDK_LOCAL FbxLayerElement(); ///< For derived classes.
     FBXSDK_LOCAL virtual ~FbxLayerElement();
 
-    FBXSDK_LOCAL void joinOwner(FbxLayerContainer* pOwner);
+    FBXSDK_LOCAL void joinOwner(FbxLayerContainer* pOwner); ///< Makes it the container's; null changes nothing.
     /// Removes entries from the array that the mapping counts in: the index array where indices are in use.
     virtual void removeEntries(int pFirst, int pCount) = 0;
 
@@ -230,10 +257,11 @@ namespace detail {
 [[noreturn]] FBXSDK_DLL void throwMissingIndexArray();
 } // namespace detail
 
+/// An element whose values are of type T. What a file holds of its arrays is read when they are first asked for.
 template <class T>
 class FbxLayerElementTemplate : public FbxLayerElement {
 public:
-    using ArrayElementType = T;
+    using ArrayElementType = T; ///< The type of the values.
 
     /// Throws std::runtime_error when there is no such array, which is so in damaged elements only.
     [[nodiscard]] FbxLayerElementArrayTemplate<T>& GetDirectArray() const {
@@ -251,9 +279,10 @@ public:
     bool Clear();
 
 protected:
-    FbxLayerElementTemplate();
+    FbxLayerElementTemplate(); ///< Two empty arrays.
     ~FbxLayerElementTemplate() override;
 
+    /// Takes entries out of the array that the mapping counts in.
     void removeEntries(int pFirst, int pCount) override;
 
 private:
@@ -272,24 +301,29 @@ extern template class FBXSDK_DLL FbxLayerElementTemplate<FbxSurfaceMaterial*>;
 extern template class FBXSDK_DLL FbxLayerElementTemplate<FbxTexture*>;
 
 /// What every class of elements declares. The new element belongs to the owner but is in no layer yet; with a null
-/// owner it belongs to nobody until it is put into a layer.
+/// owner it has no owner until it is put into a layer.
 #define FBXSDK_LAYER_ELEMENT_DECLARE(Class)                                                                            \
 public:                                                                                                                \
+    /** Makes an element that belongs to the owner and is in no layer yet; a null name is the empty name. */           \
     static Class* Create(FbxLayerContainer* pOwner, const char* pName);                                                \
                                                                                                                        \
 protected:                                                                                                             \
+    /** For Create. */                                                                                                 \
     FBXSDK_LOCAL Class();                                                                                              \
     FBXSDK_LOCAL ~Class() override;                                                                                    \
                                                                                                                        \
 private:                                                                                                               \
     friend struct detail::LayerElementAccess;
 
+/// Normals, of length 1 in most files; they are handed out as stored, the w too: 1 where a file has none.
 class FBXSDK_DLL FbxLayerElementNormal : public FbxLayerElementTemplate<FbxVector4> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementNormal)
 };
+/// Binormals: perpendicular to normal and tangent.
 class FBXSDK_DLL FbxLayerElementBinormal : public FbxLayerElementTemplate<FbxVector4> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementBinormal)
 };
+/// Tangents: the direction in which u grows.
 class FBXSDK_DLL FbxLayerElementTangent : public FbxLayerElementTemplate<FbxVector4> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementTangent)
 };
@@ -301,9 +335,11 @@ class FBXSDK_DLL FbxLayerElementMaterial : public FbxLayerElementTemplate<FbxSur
 class FBXSDK_DLL FbxLayerElementPolygonGroup : public FbxLayerElementTemplate<int> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementPolygonGroup)
 };
+/// Texture coordinates, mostly with indices; the image lies between 0 and 1.
 class FBXSDK_DLL FbxLayerElementUV : public FbxLayerElementTemplate<FbxVector2> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementUV)
 };
+/// Colours, 0 to 1.
 class FBXSDK_DLL FbxLayerElementVertexColor : public FbxLayerElementTemplate<FbxColor> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementVertexColor)
 };
@@ -315,9 +351,11 @@ class FBXSDK_DLL FbxLayerElementSmoothing : public FbxLayerElementTemplate<int> 
 class FBXSDK_DLL FbxLayerElementCrease : public FbxLayerElementTemplate<double> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementCrease)
 };
+/// By polygon: whether it is a hole.
 class FBXSDK_DLL FbxLayerElementHole : public FbxLayerElementTemplate<bool> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementHole)
 };
+/// Whether an edge or polygon is shown.
 class FBXSDK_DLL FbxLayerElementVisibility : public FbxLayerElementTemplate<bool> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementVisibility)
 };
@@ -326,132 +364,169 @@ class FBXSDK_DLL FbxLayerElementTexture : public FbxLayerElementTemplate<FbxText
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementTexture)
 };
 
-typedef FbxLayerElement FbxGeometryElement;
-typedef FbxLayerElementNormal FbxGeometryElementNormal;
-typedef FbxLayerElementBinormal FbxGeometryElementBinormal;
-typedef FbxLayerElementTangent FbxGeometryElementTangent;
-typedef FbxLayerElementMaterial FbxGeometryElementMaterial;
-typedef FbxLayerElementPolygonGroup FbxGeometryElementPolygonGroup;
-typedef FbxLayerElementUV FbxGeometryElementUV;
-typedef FbxLayerElementVertexColor FbxGeometryElementVertexColor;
-typedef FbxLayerElementSmoothing FbxGeometryElementSmoothing;
-typedef FbxLayerElementCrease FbxGeometryElementCrease;
-typedef FbxLayerElementHole FbxGeometryElementHole;
-typedef FbxLayerElementVisibility FbxGeometryElementVisibility;
+typedef FbxLayerElement FbxGeometryElement;                         ///< The same under another name of the API.
+typedef FbxLayerElementNormal FbxGeometryElementNormal;             ///< The same under another name of the API.
+typedef FbxLayerElementBinormal FbxGeometryElementBinormal;         ///< The same under another name of the API.
+typedef FbxLayerElementTangent FbxGeometryElementTangent;           ///< The same under another name of the API.
+typedef FbxLayerElementMaterial FbxGeometryElementMaterial;         ///< The same under another name of the API.
+typedef FbxLayerElementPolygonGroup FbxGeometryElementPolygonGroup; ///< The same under another name of the API.
+typedef FbxLayerElementUV FbxGeometryElementUV;                     ///< The same under another name of the API.
+typedef FbxLayerElementVertexColor FbxGeometryElementVertexColor;   ///< The same under another name of the API.
+typedef FbxLayerElementSmoothing FbxGeometryElementSmoothing;       ///< The same under another name of the API.
+typedef FbxLayerElementCrease FbxGeometryElementCrease;             ///< The same under another name of the API.
+typedef FbxLayerElementHole FbxGeometryElementHole;                 ///< The same under another name of the API.
+typedef FbxLayerElementVisibility FbxGeometryElementVisibility;     ///< The same under another name of the API.
 
-/// At most one element of each type; textures and texture coordinates one for each texture channel.
+/// A place for elements: at most one of each type; textures and texture coordinates one for each texture channel.
 ///
-/// Getters are null when the layer has no such element. Setters replace it and hand the new one to the layer's
-/// container; null takes it out.
+/// Layers belong to their container. Getters are null when the layer has no such element. Setters replace it and hand
+/// the new one to the layer's container; null takes it out, and it lives on until the container's end.
 class FBXSDK_DLL FbxLayer {
 public:
     FbxLayer(const FbxLayer&) = delete;
     FbxLayer& operator=(const FbxLayer&) = delete;
 
+    /// The layer's normals; null when it has none.
     [[nodiscard]] FbxLayerElementNormal* GetNormals() { return get<FbxLayerElementNormal>(FbxLayerElement::eNormal); }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementNormal* GetNormals() const {
         return get<FbxLayerElementNormal>(FbxLayerElement::eNormal);
     }
+    /// Puts them into the layer, in place of any others.
     void SetNormals(FbxLayerElementNormal* pNormals) { set(pNormals, FbxLayerElement::eNormal); }
 
+    /// The layer's binormals; null when it has none.
     [[nodiscard]] FbxLayerElementBinormal* GetBinormals() {
         return get<FbxLayerElementBinormal>(FbxLayerElement::eBiNormal);
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementBinormal* GetBinormals() const {
         return get<FbxLayerElementBinormal>(FbxLayerElement::eBiNormal);
     }
+    /// Puts them into the layer, in place of any others.
     void SetBinormals(FbxLayerElementBinormal* pBinormals) { set(pBinormals, FbxLayerElement::eBiNormal); }
 
+    /// The layer's tangents; null when it has none.
     [[nodiscard]] FbxLayerElementTangent* GetTangents() {
         return get<FbxLayerElementTangent>(FbxLayerElement::eTangent);
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementTangent* GetTangents() const {
         return get<FbxLayerElementTangent>(FbxLayerElement::eTangent);
     }
+    /// Puts them into the layer, in place of any others.
     void SetTangents(FbxLayerElementTangent* pTangents) { set(pTangents, FbxLayerElement::eTangent); }
 
+    /// Which material of the node each polygon has; null when the layer does not say.
     [[nodiscard]] FbxLayerElementMaterial* GetMaterials() {
         return get<FbxLayerElementMaterial>(FbxLayerElement::eMaterial);
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementMaterial* GetMaterials() const {
         return get<FbxLayerElementMaterial>(FbxLayerElement::eMaterial);
     }
+    /// Puts them into the layer, in place of any others.
     void SetMaterials(FbxLayerElementMaterial* pMaterials) { set(pMaterials, FbxLayerElement::eMaterial); }
 
+    /// The group of each polygon; null when the layer does not say.
     [[nodiscard]] FbxLayerElementPolygonGroup* GetPolygonGroups() {
         return get<FbxLayerElementPolygonGroup>(FbxLayerElement::ePolygonGroup);
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementPolygonGroup* GetPolygonGroups() const {
         return get<FbxLayerElementPolygonGroup>(FbxLayerElement::ePolygonGroup);
     }
+    /// Puts them into the layer, in place of any others.
     void SetPolygonGroups(FbxLayerElementPolygonGroup* pGroups) { set(pGroups, FbxLayerElement::ePolygonGroup); }
 
     /// The set of a texture channel; the diffuse one is the layer's ordinary set. Null for types that are no channel.
     [[nodiscard]] FbxLayerElementUV* GetUVs(FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eTextureDiffuse) {
         return isTextureChannel(pTypeIdentifier) ? get<FbxLayerElementUV>(uvSlot(pTypeIdentifier)) : nullptr;
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementUV*
     GetUVs(FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eTextureDiffuse) const {
         return isTextureChannel(pTypeIdentifier) ? get<FbxLayerElementUV>(uvSlot(pTypeIdentifier)) : nullptr;
     }
+    /// Puts the set into the layer as that of the channel; types that are no channel change nothing.
     void SetUVs(FbxLayerElementUV* pUVs, FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eTextureDiffuse) {
         if (isTextureChannel(pTypeIdentifier))
             set(pUVs, uvSlot(pTypeIdentifier));
     }
 
+    /// The layer's colours; null when it has none.
     [[nodiscard]] FbxLayerElementVertexColor* GetVertexColors() {
         return get<FbxLayerElementVertexColor>(FbxLayerElement::eVertexColor);
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementVertexColor* GetVertexColors() const {
         return get<FbxLayerElementVertexColor>(FbxLayerElement::eVertexColor);
     }
+    /// Puts them into the layer, in place of any others.
     void SetVertexColors(FbxLayerElementVertexColor* pColors) { set(pColors, FbxLayerElement::eVertexColor); }
 
+    /// The smoothing of edges or polygons; null when the layer does not say.
     [[nodiscard]] FbxLayerElementSmoothing* GetSmoothing() {
         return get<FbxLayerElementSmoothing>(FbxLayerElement::eSmoothing);
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementSmoothing* GetSmoothing() const {
         return get<FbxLayerElementSmoothing>(FbxLayerElement::eSmoothing);
     }
+    /// Puts it into the layer, in place of any other.
     void SetSmoothing(FbxLayerElementSmoothing* pSmoothing) { set(pSmoothing, FbxLayerElement::eSmoothing); }
 
+    /// The creases of control points; null when the layer has none.
     [[nodiscard]] FbxLayerElementCrease* GetVertexCrease() {
         return get<FbxLayerElementCrease>(FbxLayerElement::eVertexCrease);
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementCrease* GetVertexCrease() const {
         return get<FbxLayerElementCrease>(FbxLayerElement::eVertexCrease);
     }
+    /// Puts them into the layer, in place of any others.
     void SetVertexCrease(FbxLayerElementCrease* pCrease) { set(pCrease, FbxLayerElement::eVertexCrease); }
 
+    /// The creases of edges; null when the layer has none.
     [[nodiscard]] FbxLayerElementCrease* GetEdgeCrease() {
         return get<FbxLayerElementCrease>(FbxLayerElement::eEdgeCrease);
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementCrease* GetEdgeCrease() const {
         return get<FbxLayerElementCrease>(FbxLayerElement::eEdgeCrease);
     }
+    /// Puts them into the layer, in place of any others.
     void SetEdgeCrease(FbxLayerElementCrease* pCrease) { set(pCrease, FbxLayerElement::eEdgeCrease); }
 
+    /// Which polygons are holes; null when the layer does not say.
     [[nodiscard]] FbxLayerElementHole* GetHole() { return get<FbxLayerElementHole>(FbxLayerElement::eHole); }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementHole* GetHole() const {
         return get<FbxLayerElementHole>(FbxLayerElement::eHole);
     }
+    /// Puts it into the layer, in place of any other.
     void SetHole(FbxLayerElementHole* pHole) { set(pHole, FbxLayerElement::eHole); }
 
+    /// What is shown; null when the layer does not say.
     [[nodiscard]] FbxLayerElementVisibility* GetVisibility() {
         return get<FbxLayerElementVisibility>(FbxLayerElement::eVisibility);
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementVisibility* GetVisibility() const {
         return get<FbxLayerElementVisibility>(FbxLayerElement::eVisibility);
     }
+    /// Puts it into the layer, in place of any other.
     void SetVisibility(FbxLayerElementVisibility* pVisibility) { set(pVisibility, FbxLayerElement::eVisibility); }
 
     /// The textures of a channel; null for types that are no channel.
     [[nodiscard]] FbxLayerElementTexture* GetTextures(FbxLayerElement::EType pType) {
         return isTextureChannel(pType) ? get<FbxLayerElementTexture>(pType) : nullptr;
     }
+    /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementTexture* GetTextures(FbxLayerElement::EType pType) const {
         return isTextureChannel(pType) ? get<FbxLayerElementTexture>(pType) : nullptr;
     }
+    /// Puts them into the layer as those of the channel; types that are no channel change nothing.
     void SetTextures(FbxLayerElement::EType pType, FbxLayerElementTexture* pTextures) {
         if (isTextureChannel(pType))
             set(pTextures, pType);
@@ -489,23 +564,25 @@ class FBXSDK_DLL FbxLayerContainer : public FbxNodeAttribute {
     FBXSDK_ABSTRACT_DECLARE(FbxLayerContainer, FbxNodeAttribute)
 
 public:
-    /// The new layer's index.
+    /// Appends an empty layer. The new layer's index.
     int CreateLayer();
-    /// Removes all layers. The elements that stood in them live on until the container's end.
+    /// Removes all layers. Their elements live on until the container's end.
     void ClearLayers();
+    /// How many layers there are; 0 for new geometry.
     [[nodiscard]] int GetLayerCount() const {
         ensureLoaded();
         return static_cast<int>(mLayers.size());
     }
     /// How many layers have an element of the type; with pUVCount, texture coordinates of the texture channel.
     [[nodiscard]] int GetLayerCount(FbxLayerElement::EType pType, bool pUVCount = false) const;
-    /// Null out of range.
+    /// The layer at that place, which belongs to the container; null out of range.
     [[nodiscard]] FbxLayer* GetLayer(int pIndex) { return layerAt(pIndex); }
+    /// The same for a const container.
     [[nodiscard]] const FbxLayer* GetLayer(int pIndex) const { return layerAt(pIndex); }
 
     /// For the scene reader: what the file holds of this object becomes its content on the first access.
     void setSource(std::unique_ptr<detail::GeometrySource> pSource);
-    [[nodiscard]] bool isPending() const { return mSource != nullptr; }
+    [[nodiscard]] bool isPending() const { return mSource != nullptr; } ///< Whether the content is still to be read.
 
 protected:
     /// Every access to what may still stand in the file starts with this.

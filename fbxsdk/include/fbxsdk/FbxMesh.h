@@ -8,13 +8,14 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// Polygon p has its corners, indices of control points, at GetPolygonVertexIndex(p) and the following places of the
-/// polygon vertex array. In a mesh read from a file all of them are control points that exist.
+/// Polygons over control points. Polygon p has its corners, indices of control points, at GetPolygonVertexIndex(p) and
+/// the following places of the polygon vertex array. In a mesh read from a file all of them are control points that
+/// exist.
 class FBXSDK_DLL FbxMesh : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxMesh, FbxGeometry)
 
 public:
-    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override;
+    [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eMesh.
 
     /// Starts a polygon. Material, texture and group are stored when layer 0 has such an element mapped by polygon; -1
     /// stores nothing.
@@ -23,18 +24,21 @@ public:
     /// it is not negative and layer 0 has coordinates mapped by polygon vertex with indices. Without a polygon that was
     /// begun nothing happens.
     void AddPolygon(int pIndex, int pTextureUVIndex = -1);
+    /// Ends the polygon; one of fewer than three corners is kept.
     void EndPolygon();
 
+    /// How many polygons there are.
     [[nodiscard]] int GetPolygonCount() const {
         ensureLoaded();
         return mPolygonStarts.count();
     }
-    /// 0 out of range.
+    /// How many corners the polygon has; 0 out of range.
     [[nodiscard]] int GetPolygonSize(int pPolygonIndex) const {
         if (pPolygonIndex < 0 || pPolygonIndex >= GetPolygonCount())
             return 0;
         return polygonEnd(pPolygonIndex) - mPolygonStarts[pPolygonIndex];
     }
+    /// How many corners all polygons have together.
     [[nodiscard]] int GetPolygonVertexCount() const {
         ensureLoaded();
         return mPolygonVertices.count();
@@ -43,7 +47,8 @@ public:
     [[nodiscard]] int GetPolygonVertexIndex(int pPolygonIndex) const {
         return pPolygonIndex >= 0 && pPolygonIndex < GetPolygonCount() ? mPolygonStarts[pPolygonIndex] : -1;
     }
-    /// Null when there are none; good until the count changes.
+    /// The control points of all corners; writing to them changes the mesh. Null when there are none; valid until the
+    /// count changes.
     [[nodiscard]] int* GetPolygonVertices() const {
         return GetPolygonVertexCount() == 0 ? nullptr : mPolygonVertices.data();
     }
@@ -61,11 +66,13 @@ public:
     [[nodiscard]] int GetTextureUVIndex(int pPolygonIndex, int pPositionInPolygon,
                                         FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eTextureDiffuse);
 
-    /// Takes the polygon out, with what layers hold for it and its corners. The index, or -1 when there is none.
+    /// Takes the polygon out, with what layers hold for it and its corners. Its former index, or -1 when there is none.
     int RemovePolygon(int pPolygonIndex);
     /// Whether every polygon has three corners; true without polygons.
     [[nodiscard]] bool IsTriangleMesh() const;
+    /// Makes room for so many polygons; the count stays.
     void ReservePolygonCount(int pCount);
+    /// Makes room for so many corners; the count stays.
     void ReservePolygonVertexCount(int pCount);
 
     /// Of the corners in the file, those that named points that there are not: they are at point 0 or, in a mesh
@@ -77,6 +84,7 @@ public:
 
     /// The platform's own view: the polygons as they are, without asking the file.
     [[nodiscard]] detail::PlainArray<int>& polygonVertices() { return mPolygonVertices; }
+    /// Where each polygon begins among the corners.
     [[nodiscard]] detail::PlainArray<int>& polygonStarts() { return mPolygonStarts; }
     /// What elements mapped by edge count: for each edge the place in the polygon vertex array where it starts. Empty
     /// unless a file had them, and from the first change of polygons on. Read from the file when first asked for.

@@ -4,9 +4,9 @@
 // The memory of geometry: contiguous items of plain types that can grow without being initialised, so that a file's
 // numbers are decoded straight into place.
 //
-// Arrays are read late. An array of a file has a source in place of items until somebody asks for one or for their
-// number. Items that the file holds in the layout of memory, compressed or not, stay with the source even then, as long
-// as only their values are asked for.
+// Arrays are lazy. An array of a file has a source in place of items until an item or the count is asked for. Items
+// that the file holds in the layout of memory, compressed or not, stay with the source even then, as long as only their
+// values are asked for.
 #pragma once
 
 #include <algorithm>
@@ -27,7 +27,7 @@ inline constexpr std::size_t kStoredBytes = sizeof(T);
 template <>
 inline constexpr std::size_t kStoredBytes<FbxVector4> = 3 * sizeof(double);
 
-/// Where the items of an array are until they are in memory. What is shown is seen through a window that moves along.
+/// Where the items of an array are until they are in memory. Shown items are accessed through a sliding window.
 ///
 /// Functions that read throw when the file was changed meanwhile, and std::bad_alloc. The source is as before then.
 class FBXSDK_DLL ItemSource {
@@ -73,9 +73,9 @@ public:
         return mCount;
     }
     [[nodiscard]] bool contains(int pIndex) const { return pIndex >= 0 && pIndex < count(); }
-    /// Whether nobody has asked for the items of the source yet.
+    /// Whether the items of the source were never asked for.
     [[nodiscard]] bool isPending() const { return mCount == kUnread; }
-    /// Takes the items of the source in place of all that were there, when somebody asks for them.
+    /// Takes the items of the source in place of all that were there, when they are first asked for.
     void setSource(std::unique_ptr<ItemSource> pSource);
 
 protected:
