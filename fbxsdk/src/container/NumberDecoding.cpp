@@ -157,6 +157,12 @@ const char* parseFast(const char* text, const char* end, Number& number) {
     return nullptr;
 }
 
+/// Past what stands between two values: in long lists nothing but a comma.
+inline const char* nextValue(const char* text, const char* end) {
+    const bool commaAlone = end - text > 1 && text[0] == ',' && (chars::is(chars::digit, text[1]) || text[1] == '-');
+    return commaAlone ? text + 1 : skipSeparators(text, end);
+}
+
 template <class Number>
 bool parseText(const StoredArray& array, std::span<Number> destination) {
     const char* text = array.bytes.data();
@@ -170,7 +176,7 @@ bool parseText(const StoredArray& array, std::span<Number> destination) {
             }
             number = parseElement<Number>(text, next, array.bitPatterns);
         }
-        text = skipSeparators(next, end);
+        text = nextValue(next, end);
     }
     return true;
 }
