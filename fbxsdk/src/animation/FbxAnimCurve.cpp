@@ -76,11 +76,28 @@ struct detail::CurveState {
     CurveCursor cursor;
 };
 
+namespace {
+
+/// Whether some of the numbers are not in memory yet.
+bool standsInFile(const detail::DocumentObject& object) {
+    for (const detail::Record& record : object.body->children()) {
+        const detail::StoredArray* const array = record.array();
+        if (array && array->file)
+            return true;
+    }
+    return false;
+}
+
+} // namespace
+
 void FbxAnimCurve::setSource(std::shared_ptr<const detail::Document> document, const detail::DocumentObject& object) {
     ++GetFbxManager()->data().revision;
     mState.reset();
     mDocument = std::move(document);
     mSource = &object;
+    // A file that is changed meanwhile fails its import, not some evaluation later on.
+    if (standsInFile(object))
+        static_cast<void>(state());
 }
 
 detail::CurveState& FbxAnimCurve::state() const {
