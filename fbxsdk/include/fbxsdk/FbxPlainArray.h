@@ -4,7 +4,7 @@
 // The memory of geometry: contiguous items of plain types that can grow without being initialised, so that a file's
 // numbers are decoded straight into place.
 //
-// Arrays are lazy. An array of a file has a source in place of items until an item or the count is asked for. Items
+// Arrays are lazy: an array of a file has a source in place of items until an item or their number is asked for. Items
 // that the file holds in the layout of memory, compressed or not, stay with the source even then, as long as only their
 // values are asked for.
 #pragma once
@@ -73,16 +73,16 @@ public:
         return mCount;
     }
     [[nodiscard]] bool contains(int pIndex) const { return pIndex >= 0 && pIndex < count(); }
-    /// Whether the items of the source were never asked for.
+    /// Whether the items are still to be read from the source.
     [[nodiscard]] bool isPending() const { return mCount == kUnread; }
-    /// Takes the items of the source in place of all that were there, when they are first asked for.
+    /// Replaces all items by those of the source, which are read on demand.
     void setSource(std::unique_ptr<ItemSource> pSource);
 
 protected:
     [[nodiscard]] void* items() const { return mItems; }
     /// Whether the source shows the items; there is no other memory of them then.
     [[nodiscard]] bool isShown() const {
-        if (mCount == kUnread)
+        if (mSource && mCount == kUnread)
             open();
         return mSource != nullptr;
     }

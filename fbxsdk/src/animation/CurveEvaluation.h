@@ -46,8 +46,8 @@ struct CurveCursor {
 /// user key.
 void multiplyValues(CurveKeys& keys, float factor);
 
-/// Tangents that such files have no letter for, automatic ones that are clamped, broken or biased, come out as the
-/// slopes that they have.
+/// The keys as files before 7.0 can hold them: tangents that they have no letter for, automatic ones that are clamped,
+/// broken or biased, come out as the slopes that they have.
 [[nodiscard]] CurveKeys legacyKeys(const CurveKeys& keys);
 
 } // namespace detail

@@ -27,14 +27,14 @@ bool readItems(const Record& record, PlainArray<int>& items);
 bool readItems(const Record& record, PlainArray<double>& items);
 bool readItems(const Record& record, PlainArray<bool>& items);
 
-/// What becomes of items at the first question.
+/// How items are read on the first access.
 enum class LateReading {
     shown, ///< items that the file has in the layout of memory, compressed or not, stay there while only values are
            ///< asked for
-    whole  ///< all items are read when somebody asks for one
+    whole  ///< all items at once
 };
 
-/// The same when somebody asks for the items. The document keeps the record alive until then. Vectors may have their
+/// The same on the first access to the array. The document keeps the record alive until then. Vectors may have their
 /// fourth numbers in a record of their own; they are 1 where there is none, and where it is corrupt: nobody needs them
 /// to use the other three.
 template <class Item>
