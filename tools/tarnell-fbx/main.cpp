@@ -83,7 +83,8 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
     dump->add_flag("--pretty", options.pretty, "Indented");
     CLI::Option* faithful =
         dump->add_flag("--faithful", options.faithful, "What the application shows instead of what hosts rely on");
-    dump->add_option("--take,--stack", options.stack, "The animation stack to read (default: the first one)")->needs(faithful);
+    dump->add_option("--take,--stack", options.stack, "The animation stack to read (default: the first one)")
+        ->needs(faithful);
 }
 
 void addConvert(CLI::App& app, tool::ConvertOptions& options) {
