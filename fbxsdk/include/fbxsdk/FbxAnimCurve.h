@@ -215,7 +215,7 @@ public:
     void setSource(std::shared_ptr<const detail::Document> document, const detail::DocumentObject& object);
 
 private:
-    [[nodiscard]] detail::CurveState& state() const;
+    [[nodiscard]] FBXSDK_LOCAL detail::CurveState& state() const;
 
     mutable std::unique_ptr<detail::CurveState> mState; ///< null until somebody asks
     mutable std::shared_ptr<const detail::Document> mDocument;
