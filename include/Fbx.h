@@ -99,10 +99,10 @@ public:
 /// TARNELL_FBX_THREADS in the environment says.
 TARNELL_FBX_API int maximumThreads();
 
-/// 0 is as many threads as the machine has; less counts as 1. Compressed arrays are then deflated, inflated and parsed
-/// on several threads, which start and end within the call that they work for; calls at the same time share them. What
-/// is read and written is the same for every number. Any thread may call this at any time; a call that has begun may
-/// still work as it began.
+/// 0 is as many threads as the machine has; less counts as 1. The arrays of a large mesh are then deflated on several
+/// threads, which start and end within the call that they work for; calls at the same time share them. Reading takes
+/// the caller's thread alone. What is written is the same for every number. Any thread may call this at any time; a
+/// call that has begun may still work as it began.
 TARNELL_FBX_API void setMaximumThreads(int count);
 
 } // namespace Tarnell::Fbx
