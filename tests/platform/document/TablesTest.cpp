@@ -7,6 +7,7 @@
 #include "document/DocumentBuilder.h"
 #include "document/PropertyNames.h"
 #include "document/SameRecords.h"
+#include "schema/PropertyTypes.h"
 
 namespace fbxsdk::detail {
 namespace {
