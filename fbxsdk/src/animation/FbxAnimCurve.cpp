@@ -122,8 +122,10 @@ detail::CurveKeys& FbxAnimCurve::editKeys() {
 void FbxAnimCurve::KeyModifyBegin() {}
 
 void FbxAnimCurve::KeyModifyEnd() {
+    if (!mState)
+        return; // guards call this where memory for the first key is missing
     // No more keys for now: the lists give back what they grew by.
-    detail::CurveKeys& keys = state().keys;
+    detail::CurveKeys& keys = mState->keys;
     keys.times.shrink_to_fit();
     keys.values.shrink_to_fit();
     keys.attributeOfKey.shrink_to_fit();
