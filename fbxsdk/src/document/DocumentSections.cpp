@@ -46,7 +46,7 @@ std::vector<DocumentProperty> originOf(std::string_view gmt, std::vector<std::ar
         std::string_view name, typeName, subTypeName;
         std::optional<std::string_view> text; ///< none for what holds nothing itself
     };
-    constexpr std::string_view kUnstated = ""; // the same scene gives the same bytes whatever saves it, and wherever
+    constexpr std::string_view kUnstated; // the same scene gives the same bytes whatever saves it, and wherever
     const Row rows[] = {{"DocumentUrl", "KString", "Url", kUnstated},
                         {"SrcDocumentUrl", "KString", "Url", kUnstated},
                         {"Original", "Compound", "", std::nullopt},
