@@ -1,18 +1,16 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What assimp sees in the files: assimp_peer SAMPLES OUT
-// Writes one JSON object per file into OUT.
+// What assimp sees in the files.
 #include <assimp/Importer.hpp>
 #include <assimp/config.h>
 #include <assimp/scene.h>
 
-#include <nlohmann/json.hpp>
+#include "PeerProgram.h"
 
 #include <algorithm>
 #include <cstdio>
 #include <filesystem>
-#include <fstream>
 #include <map>
 #include <string>
 
@@ -142,28 +140,18 @@ private:
     std::map<std::string, json> mObjects;
 };
 
+json look(const std::filesystem::path& path, const json& expected) {
+    Assimp::Importer importer;
+    const aiScene* const scene = importer.ReadFile(path.string(), 0);
+    if (!scene) {
+        std::fprintf(stderr, "%s: %s\n", path.filename().c_str(), importer.GetErrorString());
+        return {};
+    }
+    return Seen(*scene, expected).result();
+}
+
+constexpr int kOldestVersion = 7100; // assimp refuses older ones
+
 } // namespace
 
-int main(int argumentCount, char** arguments) {
-    if (argumentCount != 3) {
-        std::fprintf(stderr, "usage: assimp_peer SAMPLES OUT\n");
-        return 2;
-    }
-    const std::filesystem::path samples = arguments[1], out = arguments[2];
-    json expected;
-    std::ifstream(samples / "expected.json") >> expected;
-    std::filesystem::create_directories(out);
-    for (const json& entry : expected["files"]) {
-        if (entry["version"] < 7100)
-            continue; // assimp refuses these
-        const std::string file = entry["file"];
-        Assimp::Importer importer;
-        const aiScene* const scene = importer.ReadFile((samples / file).string(), 0);
-        if (!scene) {
-            std::fprintf(stderr, "%s: %s\n", file.c_str(), importer.GetErrorString());
-            return 1;
-        }
-        std::ofstream(out / (file + ".json")) << Seen(*scene, expected).result().dump(1) << '\n';
-    }
-    return 0;
-}
+int main(int argumentCount, char** arguments) { return runPeer(argumentCount, arguments, look, kOldestVersion); }

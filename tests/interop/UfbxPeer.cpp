@@ -1,16 +1,14 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What ufbx sees in the files: ufbx_peer SAMPLES OUT
-// Writes one JSON object per file into OUT. It opens every version in both encodings, and evaluates scenes.
+// What ufbx sees in the files. It opens every version in both encodings, and evaluates scenes.
 #include <ufbx.h>
 
-#include <nlohmann/json.hpp>
+#include "PeerProgram.h"
 
 #include <cmath>
 #include <cstdio>
 #include <filesystem>
-#include <fstream>
 #include <memory>
 #include <string>
 
@@ -134,14 +132,14 @@ bool evaluate(const ufbx_scene& scene, const std::string& file, const json& expe
     return true;
 }
 
-bool look(const std::filesystem::path& path, const json& expected, const std::filesystem::path& out) {
+json look(const std::filesystem::path& path, const json& expected) {
     ufbx_load_opts options = {};
     options.load_external_files = options.ignore_missing_external_files = true; // compatible files name some
     ufbx_error error = {};
     const std::string file = path.filename().string();
     const Scene scene = told(ufbx_load_file(path.c_str(), &options, &error), file, error);
     if (!scene)
-        return false;
+        return {};
     json objects = json::array(), warnings = json::array();
     for (const ufbx_node* const node : scene->nodes) {
         if (!node->is_root)
@@ -152,25 +150,12 @@ bool look(const std::filesystem::path& path, const json& expected, const std::fi
     json seen = {{"rate", scene->settings.frames_per_second}, {"warnings", warnings}, {"stacks", json::array()}};
     for (const ufbx_anim_stack* const stack : scene->anim_stacks)
         seen["stacks"].push_back(textOf(stack->name));
-    const bool evaluated = evaluate(*scene, file, expected, objects);
+    if (!evaluate(*scene, file, expected, objects))
+        return {};
     seen["objects"] = objects;
-    std::ofstream(out / (file + ".json")) << seen.dump(1) << '\n';
-    return evaluated;
+    return seen;
 }
 
 } // namespace
 
-int main(int argumentCount, char** arguments) {
-    if (argumentCount != 3) {
-        std::fprintf(stderr, "usage: ufbx_peer SAMPLES OUT\n");
-        return 2;
-    }
-    const std::filesystem::path samples = arguments[1], out = arguments[2];
-    json expected;
-    std::ifstream(samples / "expected.json") >> expected;
-    std::filesystem::create_directories(out);
-    bool allSeen = true;
-    for (const json& entry : expected["files"])
-        allSeen = look(samples / entry["file"].get<std::string>(), expected, out) && allSeen;
-    return allSeen ? 0 : 1;
-}
+int main(int argumentCount, char** arguments) { return runPeer(argumentCount, arguments, look); }

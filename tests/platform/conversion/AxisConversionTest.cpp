@@ -16,10 +16,7 @@
 namespace {
 
 using namespace fbxsdk;
-using animate::addLayer;
-using animate::addStack;
-using animate::keys;
-using animate::seconds;
+using namespace animate;
 
 /// Up, front and the third axis of a system as the columns of a matrix.
 plain::Matrix basisOf(const FbxAxisSystem& system) {

@@ -17,10 +17,7 @@
 namespace {
 
 using namespace fbxsdk;
-using animate::addLayer;
-using animate::addStack;
-using animate::keys;
-using animate::seconds;
+using namespace animate;
 
 class UnitConversionTest : public ConversionFixture {
 protected:

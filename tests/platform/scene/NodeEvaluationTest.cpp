@@ -18,10 +18,7 @@
 namespace {
 
 using namespace fbxsdk;
-using animate::addLayer;
-using animate::addStack;
-using animate::keys;
-using animate::seconds;
+using namespace animate;
 
 constexpr auto kSet = FbxNode::eSourcePivot;
 
