@@ -77,7 +77,7 @@ std::string hexadecimal(std::string_view bytes) {
 
 class RecordPage {
 public:
-    RecordPage(const RecordFile& file, const RecordsOptions& options)
+    RecordPage(RecordFile& file, const RecordsOptions& options)
         : mFile(file), mOptions(options), mPath(pathParts(options.path)) {}
 
     /// Whether anything stands under the path that was asked for.
@@ -141,7 +141,7 @@ private:
     }
 
     void printLine(const FileRecord& record, std::size_t level, bool folded, std::ostream& out) const {
-        const std::string place = std::to_string(record.location());
+        const std::string place = std::to_string(mFile.isAscii() ? mFile.lineOf(record) : record.location());
         const std::size_t depth = level + 1 - std::min(level + 1, std::max<std::size_t>(mPath.size(), 1));
         const std::string blanks(mColumn - std::min(mColumn, place.size()), ' ');
         out << blanks << mTerminal->paint(Ink::faint, place) << std::string(2 + depth * 2, ' ')
@@ -209,7 +209,7 @@ private:
         json.beginObject();
         json.text("name", record.name());
         if (mFile.isAscii()) {
-            json.integer("line", static_cast<long long>(record.location()));
+            json.integer("line", static_cast<long long>(mFile.lineOf(record)));
         } else {
             json.integer("offset", static_cast<long long>(record.location()));
             json.integer("end", static_cast<long long>(mFile.endOf(record)));
@@ -278,7 +278,7 @@ private:
         json.boolean("deflated", value.compressed);
     }
 
-    const RecordFile& mFile;
+    RecordFile& mFile;
     const RecordsOptions& mOptions;
     std::vector<std::string> mPath;
     const Terminal* mTerminal = nullptr;

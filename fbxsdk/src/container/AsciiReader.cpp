@@ -12,7 +12,6 @@
 #include "container/AsciiReader.h"
 
 #include <algorithm>
-#include <cstring>
 #include <limits>
 #include <string>
 #include <string_view>
@@ -20,6 +19,7 @@
 
 #include "container/AsciiPreamble.h"
 #include "container/FileFormat.h"
+#include "container/LineCounter.h"
 #include "container/NumberRun.h"
 #include "container/NumberText.h"
 #include "container/ReadLimits.h"
@@ -51,22 +51,6 @@ std::string decodeEntities(std::string_view text) {
     return decoded;
 }
 
-/// The first such byte, or the end. Texts may be megabytes of encoded pictures.
-const char* findByte(const char* text, const char* end, char byte) {
-    const void* const found = std::memchr(text, byte, static_cast<std::size_t>(end - text));
-    return found != nullptr ? static_cast<const char*>(found) : end;
-}
-
-std::uint64_t countBytes(const char* text, const char* end, char byte) {
-    std::uint64_t count = 0;
-    // Lines are long where files are large, so that searching beats counting byte by byte.
-    while ((text = findByte(text, end, byte)) != end) {
-        ++count;
-        ++text;
-    }
-    return count;
-}
-
 /// Where the text ends: disks and tools fill the rest of a block with zeros.
 const char* endOfText(std::span<const char> bytes) {
     const char* end = bytes.data() + bytes.size();
@@ -75,9 +59,6 @@ const char* endOfText(std::span<const char> bytes) {
     }
     return end;
 }
-
-/// A carriage return where a file has no line feed at all, as files of old Macintosh programs.
-char lineEndOf(const char* text, const char* end) { return findByte(text, end, '\n') != end ? '\n' : '\r'; }
 
 /// A record whose block is being read.
 struct OpenBlock {
@@ -88,25 +69,30 @@ struct OpenBlock {
 class AsciiReader {
 public:
     AsciiReader(std::span<const char> bytes, RecordTree& tree, FbxStatus& status)
-        : mStart(bytes.data()), mEnd(endOfText(bytes)), mLineEnd(lineEndOf(mStart, mEnd)), mNext(mStart),
-          mCounted(mStart), mTree(tree), mStatus(status) {}
+        : mStart(bytes.data()), mEnd(endOfText(bytes)), mNext(mStart), mTree(tree), mStatus(status) {
+        mTree.source = {mStart, mEnd};
+    }
 
     bool read() { return readVersion() && readRecords(); }
 
 private:
     bool fail(const char* place, const std::string& what, FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
-        const std::string line = std::to_string(1 + countBytes(mStart, place, mLineEnd));
-        mStatus.SetCode(code, "%s: line %s: %s", mTree.fileName.c_str(), line.c_str(), what.c_str());
+        mStatus.SetCode(code, "%s: line %s: %s", mTree.fileName.c_str(), lineOf(place).c_str(), what.c_str());
         return false;
     }
     bool failUnexpected(const char* place, const std::string& expected);
     bool refuseZeros(std::string_view token);
 
+    [[nodiscard]] std::string lineOf(const char* place) const {
+        return std::to_string(LineCounter(mTree.source).lineAt(static_cast<std::size_t>(place - mStart)));
+    }
+
     [[nodiscard]] bool nextIs(char c) const { return mNext != mEnd && *mNext == c; }
-    [[nodiscard]] bool nextIsName() const;
-    std::uint64_t countLines(const char* place);
+    [[nodiscard]] const char* itemEnd() const;
+    [[nodiscard]] const char* nameColon(const char* end) const;
     std::string_view readToken();
-    bool readQuoted(std::string_view& text);
+    bool readQuoted(const char* end, std::string_view& text);
+    bool readName(std::string_view& name);
 
     bool readVersion();
     bool readRecords();
@@ -117,18 +103,15 @@ private:
 
     bool readValues(Record& record);
     bool readNumberList(Record& record);
-    bool readValue(const Record& record, Value& value);
-    bool readBareValue(Value& value);
+    bool readValue(const Record& record, const char* end, Value& value);
+    bool readBareValue(const char* end, Value& value);
     bool readArray(const Record& record, Value& value);
     StoredArray& keepArray(const char* start, const NumberRun& run);
     void keepValues(Record& record);
 
     const char* mStart;
     const char* mEnd;
-    char mLineEnd; ///< what lines are counted by
     const char* mNext;
-    const char* mCounted; ///< up to where lines are counted
-    std::uint64_t mLine = 1;
     RecordTree& mTree;
     FbxStatus& mStatus;
     std::uint32_t mArrayVersion = 0; ///< how arrays are to be understood
@@ -153,24 +136,23 @@ bool AsciiReader::refuseZeros(std::string_view token) {
     return zero == std::string_view::npos || fail(token.data() + zero, "a zero byte in the text");
 }
 
-/// Whether a name and its colon come next: the start of a record, where otherwise a value might stand.
-bool AsciiReader::nextIsName() const {
-    const char* after = tokenEnd(mNext, mEnd);
-    if (nextIs('"')) {
-        after = findByte(mNext + 1, mEnd, '"');
-        if (after == mEnd) {
-            return false;
-        }
-        ++after;
+/// The end of the quoted text or the token that comes next; null for a text without a closing quote.
+const char* AsciiReader::itemEnd() const {
+    if (!nextIs('"')) {
+        return tokenEnd(mNext, mEnd);
     }
-    const char* const colon = skipBlanks(after, mEnd);
-    return after != mNext && colon != mEnd && *colon == ':';
+    const char* const quote = findByte(mNext + 1, mEnd, '"');
+    return quote != mEnd ? quote + 1 : nullptr;
 }
 
-std::uint64_t AsciiReader::countLines(const char* place) {
-    mLine += countBytes(mCounted, place, mLineEnd);
-    mCounted = place;
-    return mLine;
+/// The colon behind what comes next and ends there: a record starts, where otherwise a value might stand. Null when
+/// there is none.
+const char* AsciiReader::nameColon(const char* end) const {
+    if (end == nullptr || end == mNext) {
+        return nullptr;
+    }
+    const char* const colon = skipBlanks(end, mEnd);
+    return colon != mEnd && *colon == ':' ? colon : nullptr;
 }
 
 std::string_view AsciiReader::readToken() {
@@ -179,17 +161,16 @@ std::string_view AsciiReader::readToken() {
     return {start, static_cast<std::size_t>(mNext - start)};
 }
 
-bool AsciiReader::readQuoted(std::string_view& text) {
-    const char* const start = mNext + 1;
-    const char* const quote = findByte(start, mEnd, '"');
-    if (quote == mEnd) {
+/// The text that ends there, behind its closing quote.
+bool AsciiReader::readQuoted(const char* end, std::string_view& text) {
+    if (end == nullptr) {
         return fail(mNext, "a text has no closing quote");
     }
-    text = {start, static_cast<std::size_t>(quote - start)};
+    text = {mNext + 1, end - 1};
     if (text.find('&') != std::string_view::npos) {
         text = mTree.keepText(decodeEntities(text));
     }
-    mNext = quote + 1;
+    mNext = end;
     return true;
 }
 
@@ -211,7 +192,7 @@ bool AsciiReader::readRecords() {
         if (mNext == mEnd) {
             const Record& open = *mOpen.back().record;
             return mOpen.size() == 1 || fail(mEnd, "the file ends within the block of '" + std::string(open.name) +
-                                                       "' from line " + std::to_string(open.location));
+                                                       "' from line " + lineOf(mStart + open.location));
         }
         if (nextIs('}') && mOpen.size() > 1) {
             mOpen.pop_back();
@@ -231,28 +212,39 @@ Record& AsciiReader::appendRecord(std::string_view name) {
 }
 
 bool AsciiReader::readRecord() {
-    if (!nextIs('"') && !refuseZeros({mNext, static_cast<std::size_t>(tokenEnd(mNext, mEnd) - mNext)})) {
-        return false;
-    }
-    if (!nextIsName()) {
-        return failUnexpected(mNext, "a name with a colon");
-    }
-    const std::uint64_t line = countLines(mNext);
+    const char* const start = mNext;
     std::string_view name;
-    if (!nextIs('"')) {
-        name = readToken();
-    } else if (!readQuoted(name)) {
+    if (!readName(name)) {
         return false;
     }
     Record& record = appendRecord(name);
-    record.location = line;
-    mNext = skipBlanks(mNext, mEnd) + 1; // the colon
+    record.location = static_cast<std::uint64_t>(start - mStart);
     if (!readValues(record)) {
         return false;
     }
     noteVersion(record);
     mNext = skipBlanks(mNext, mEnd);
     return !nextIs('{') || openBlock(record);
+}
+
+/// With its colon.
+bool AsciiReader::readName(std::string_view& name) {
+    const char* const end = itemEnd();
+    const bool quoted = nextIs('"');
+    if (!quoted && !refuseZeros({mNext, end})) {
+        return false;
+    }
+    const char* const colon = nameColon(end);
+    if (colon == nullptr) {
+        return failUnexpected(mNext, "a name with a colon");
+    }
+    if (!quoted) {
+        name = {mNext, end};
+    } else if (!readQuoted(end, name)) {
+        return false;
+    }
+    mNext = colon + 1;
+    return true;
 }
 
 bool AsciiReader::openBlock(Record& record) {
@@ -279,9 +271,13 @@ bool AsciiReader::readValues(Record& record) {
         return true;
     }
     mValues.clear();
-    while (mNext != mEnd && !nextIs('{') && !nextIs('}') && !nextIsName()) {
+    while (mNext != mEnd && !nextIs('{') && !nextIs('}')) {
+        const char* const end = itemEnd();
+        if (nameColon(end) != nullptr) {
+            break;
+        }
         Value value;
-        if (!readValue(record, value)) {
+        if (!readValue(record, end, value)) {
             return false;
         }
         mValues.push_back(value);
@@ -298,12 +294,15 @@ bool AsciiReader::readValues(Record& record) {
 /// Takes the values as one array if they are many and nothing but numbers. Otherwise leaves them to be read singly.
 bool AsciiReader::readNumberList(Record& record) {
     const char* const start = mNext;
+    if (start == mEnd || *start == '"' || *start == '*') {
+        return false;
+    }
     const NumberRun run = scanNumbers(start, mEnd, /*wordsCount*/ false);
     if (run.count < kShortestList) {
         return false;
     }
     mNext = run.next;
-    if (run.afterComma && mNext != mEnd && !nextIs('{') && !nextIs('}') && !nextIsName()) {
+    if (run.afterComma && mNext != mEnd && !nextIs('{') && !nextIs('}') && nameColon(itemEnd()) == nullptr) {
         mNext = start;
         return false;
     }
@@ -312,30 +311,32 @@ bool AsciiReader::readNumberList(Record& record) {
     return true;
 }
 
-bool AsciiReader::readValue(const Record& record, Value& value) {
+/// The value that ends there, unless it is an array.
+bool AsciiReader::readValue(const Record& record, const char* end, Value& value) {
     if (nextIs('*')) {
         return readArray(record, value);
     }
     if (!nextIs('"')) {
-        return readBareValue(value);
+        return readBareValue(end, value);
     }
     std::string_view text;
-    if (!readQuoted(text)) {
+    if (!readQuoted(end, text)) {
         return false;
     }
     value = Value::ofText(text);
     return true;
 }
 
-bool AsciiReader::readBareValue(Value& value) {
+bool AsciiReader::readBareValue(const char* end, Value& value) {
     const char* const start = mNext;
-    const std::string_view token = readToken();
+    const std::string_view token(start, end);
     if (token.empty()) {
         return failUnexpected(start, "a value");
     }
     if (!refuseZeros(token)) {
         return false;
     }
+    mNext = end;
     if (const std::optional<std::int64_t> integer = parseInteger(token)) {
         value = Value::ofInteger(*integer);
         return true;
@@ -367,11 +368,11 @@ bool AsciiReader::readArray(const Record& record, Value& value) {
     }
     mNext = skipBlanks(mNext + 1, mEnd);
     if (!nextIs('}')) {
-        const char* const name = mNext;
-        if (!nextIsName() || readToken() != "a") {
-            return failUnexpected(name, "'a:'");
+        const char* const colon = nameColon(itemEnd());
+        if (colon == nullptr || std::string_view(mNext, tokenEnd(mNext, mEnd)) != "a") {
+            return failUnexpected(mNext, "'a:'");
         }
-        mNext = skipSeparators(skipBlanks(mNext, mEnd) + 1, mEnd);
+        mNext = skipSeparators(colon + 1, mEnd);
     }
     const char* const start = mNext;
     const NumberRun run = scanNumbers(start, mEnd, /*wordsCount*/ true);

@@ -109,12 +109,17 @@ private:
     bool readHeader();
     bool readRecords();
     bool readHead(Head& head);
+    template <class Field>
+    void loadFields(Head& head, const char* bytes) const;
     bool readRecord(const Head& head, std::size_t start);
     void closeBlock();
     Record& appendRecord(std::string_view name);
 
     bool readValues(Record& record, const Head& head, std::size_t end);
     bool readScalarList(Record& record, std::size_t count, std::size_t end);
+    bool readPlainValue(Value& value, std::size_t end);
+    template <class Number>
+    bool readPlainNumber(Value& value, const char* bytes, std::size_t left);
     bool readValue(Value& value, std::size_t end);
     bool readValueOf(char code, Value& value, std::size_t end);
     template <class Number>
@@ -181,21 +186,27 @@ void BinaryReader::closeBlock() {
 }
 
 bool BinaryReader::readHead(Head& head) {
-    const std::size_t fieldSize = mWide ? 8 : 4;
-    const std::size_t left = mOpen.back().end - mOffset;
-    if (left < 3 * fieldSize + 1) {
+    const std::size_t size = mWide ? 3 * sizeof(std::uint64_t) + 1 : 3 * sizeof(std::uint32_t) + 1;
+    if (mOpen.back().end - mOffset < size) {
         return fail(mOffset, "record head exceeds " + std::string(mOpen.size() > 1 ? "its block" : "the file"));
     }
-    const auto field = [&](std::size_t index) {
-        const std::size_t offset = mOffset + index * fieldSize;
-        return mWide ? numberAt<std::uint64_t>(offset) : numberAt<std::uint32_t>(offset);
-    };
-    head.end = field(0);
-    head.valueCount = field(1);
-    head.valueBytes = field(2);
-    head.nameLength = numberAt<std::uint8_t>(mOffset + 3 * fieldSize);
-    mOffset += 3 * fieldSize + 1;
+    mAhead.need(mOffset, size);
+    const char* const bytes = mBytes.data() + mOffset;
+    if (mWide) {
+        loadFields<std::uint64_t>(head, bytes);
+    } else {
+        loadFields<std::uint32_t>(head, bytes);
+    }
+    mOffset += size;
     return true;
+}
+
+template <class Field>
+void BinaryReader::loadFields(Head& head, const char* bytes) const {
+    head.end = loadNumber<Field>(bytes, mSwap);
+    head.valueCount = loadNumber<Field>(bytes + sizeof(Field), mSwap);
+    head.valueBytes = loadNumber<Field>(bytes + 2 * sizeof(Field), mSwap);
+    head.nameLength = static_cast<std::uint8_t>(bytes[3 * sizeof(Field)]);
 }
 
 Record& BinaryReader::appendRecord(std::string_view name) {
@@ -249,12 +260,67 @@ bool BinaryReader::readValues(Record& record, const Head& head, std::size_t end)
         return true;
     }
     const std::span<Value> values = mTree.newValues(count);
+    const bool isSmall = end - mOffset <= kMostReadAlong;
+    if (isSmall) {
+        mAhead.need(mOffset, end - mOffset);
+    }
     for (Value& value : values) {
-        if (!readValue(value, end)) {
+        if (!(isSmall && readPlainValue(value, end)) && !readValue(value, end)) {
             return false;
         }
     }
     record.values = values;
+    return true;
+}
+
+/// The usual values, of bytes that were fetched. False, with nothing done, for all others and for faulty ones.
+bool BinaryReader::readPlainValue(Value& value, std::size_t end) {
+    if (mOffset == end) {
+        return false;
+    }
+    const char* const bytes = mBytes.data() + mOffset + 1;
+    const std::size_t left = end - mOffset - 1;
+    switch (bytes[-1]) {
+    case 'I':
+        return readPlainNumber<std::int32_t>(value, bytes, left);
+    case 'L':
+        return readPlainNumber<std::int64_t>(value, bytes, left);
+    case 'D':
+        return readPlainNumber<double>(value, bytes, left);
+    case 'S': {
+        constexpr std::size_t kSizeBytes = 4;
+        if (left < kSizeBytes) {
+            return false;
+        }
+        const std::size_t size = loadNumber<std::uint32_t>(bytes, mSwap);
+        if (size > left - kSizeBytes) {
+            return false;
+        }
+        value.type = Value::Type::text;
+        value.code = 'S';
+        value.text = {bytes + kSizeBytes, size};
+        mOffset += 1 + kSizeBytes + size;
+        return true;
+    }
+    default:
+        return false;
+    }
+}
+
+template <class Number>
+bool BinaryReader::readPlainNumber(Value& value, const char* bytes, std::size_t left) {
+    if (left < sizeof(Number)) {
+        return false;
+    }
+    value.code = bytes[-1];
+    if constexpr (std::is_integral_v<Number>) {
+        value.type = Value::Type::integer;
+        value.integer = loadNumber<Number>(bytes, mSwap);
+    } else {
+        value.type = Value::Type::real;
+        value.real = loadNumber<Number>(bytes, mSwap);
+    }
+    mOffset += 1 + sizeof(Number);
     return true;
 }
 

@@ -127,23 +127,12 @@ const char* commentEnd(const char* text, const char* end) {
     return std::find_if(text, end, [](char c) { return c == '\n' || c == '\r'; });
 }
 
-const char* skipBlanks(const char* text, const char* end) {
-    while (text != end) {
-        if (chars::is(chars::blank, *text)) {
+const char* skipComments(const char* text, const char* end) {
+    while (text != end && *text == ';') {
+        text = commentEnd(text, end);
+        while (text != end && chars::is(chars::blank, *text)) {
             ++text;
-        } else if (*text == ';') {
-            text = commentEnd(text, end);
-        } else {
-            break;
         }
-    }
-    return text;
-}
-
-const char* skipSeparators(const char* text, const char* end) {
-    text = skipBlanks(text, end);
-    while (text != end && *text == ',') {
-        text = skipBlanks(text + 1, end);
     }
     return text;
 }
@@ -167,6 +156,18 @@ std::optional<float> parseFloat(std::string_view token) { return parse<float>(to
 std::optional<std::int64_t> parseInteger(std::string_view token) {
     if (token.size() > 1 && token.front() == '+' && !isSign(token[1])) {
         token.remove_prefix(1);
+    }
+    // Most are short; those cannot overflow.
+    constexpr std::size_t kFits = 18;
+    if (!token.empty() && token.size() <= kFits && token.front() != '-') {
+        std::int64_t number = 0;
+        for (const char c : token) {
+            if (!chars::is(chars::digit, c)) {
+                return std::nullopt;
+            }
+            number = 10 * number + (c - '0');
+        }
+        return number;
     }
     const char* const end = token.data() + token.size();
     std::int64_t number = 0;

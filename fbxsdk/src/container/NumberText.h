@@ -54,10 +54,23 @@ inline constexpr auto kKinds = [] {
 /// The end of a comment: a line feed, or a carriage return in files of systems that had it alone.
 [[nodiscard]] const char* commentEnd(const char* text, const char* end);
 
+/// Past comments, and blanks behind each.
+[[nodiscard]] const char* skipComments(const char* text, const char* end);
 /// Past blanks and comments.
-[[nodiscard]] const char* skipBlanks(const char* text, const char* end);
+[[nodiscard]] inline const char* skipBlanks(const char* text, const char* end) {
+    while (text != end && chars::is(chars::blank, *text)) {
+        ++text;
+    }
+    return text == end || *text != ';' ? text : skipComments(text, end);
+}
 /// Past blanks, comments and commas: what stands between two values. A comma too many means nothing.
-[[nodiscard]] const char* skipSeparators(const char* text, const char* end);
+[[nodiscard]] inline const char* skipSeparators(const char* text, const char* end) {
+    text = skipBlanks(text, end);
+    while (text != end && *text == ',') {
+        text = skipBlanks(text + 1, end);
+    }
+    return text;
+}
 
 /// How many of the eight bytes at `text` are digits before the first that is none.
 [[nodiscard]] inline int digitsOfEight(const char* text) {

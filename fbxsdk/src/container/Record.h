@@ -6,13 +6,16 @@
 // as long as its RecordTree.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <deque>
 #include <memory>
 #include <memory_resource>
+#include <new>
 #include <span>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #include <vector>
 
 #include <fbxsdk/FbxArch.h>
@@ -50,18 +53,45 @@ struct Value {
     };
     std::string_view text; ///< of text (entities decoded, UTF-8 as stored), raw (bytes) and word (bare word or letter)
 
-    static Value ofInteger(std::int64_t number);
-    static Value ofReal(double number);
-    static Value ofText(std::string_view text);
-    static Value ofWord(std::string_view word);
-    static Value ofArray(const StoredArray& array);
+    static Value ofInteger(std::int64_t number) {
+        Value value;
+        value.type = Type::integer;
+        value.integer = number;
+        return value;
+    }
+    static Value ofReal(double number) {
+        Value value;
+        value.type = Type::real;
+        value.real = number;
+        return value;
+    }
+    static Value ofText(std::string_view text) {
+        Value value;
+        value.type = Type::text;
+        value.text = text;
+        return value;
+    }
+    static Value ofWord(std::string_view word) {
+        Value value;
+        value.type = Type::word;
+        value.text = word;
+        return value;
+    }
+    static Value ofArray(const StoredArray& array) {
+        Value value;
+        value.type = Type::array;
+        value.array = &array;
+        return value;
+    }
 
     [[nodiscard]] bool isNumber() const { return type == Type::integer || type == Type::real; }
     /// Reals are truncated toward zero and saturate; NaN gives 0; a one-byte word gives its character code.
     [[nodiscard]] std::int64_t toInteger(std::int64_t fallback = 0) const;
     [[nodiscard]] double toReal(double fallback = 0.0) const;
     /// Text, raw or word; empty for anything else.
-    [[nodiscard]] std::string_view toText() const;
+    [[nodiscard]] std::string_view toText() const {
+        return type == Type::text || type == Type::raw || type == Type::word ? text : std::string_view();
+    }
     /// The letter of a one-letter code ('T', 'C'), whether the file stores it as a char, a word or a string; 0 if none.
     [[nodiscard]] char toLetter() const;
 };
@@ -71,11 +101,13 @@ struct Value {
 /// A long list of plain numbers, whether an array of a 7.x file or the scalar list of an older one, is a single value
 /// of type array.
 struct Record {
+    static constexpr Value kNoValue{};
+
     std::string_view name;
     std::span<const Value> values;
     const Record* firstChild = nullptr;
     const Record* nextSibling = nullptr;
-    std::uint64_t location = 0; ///< byte offset in a binary file, line in an ASCII one
+    std::uint64_t location = 0; ///< byte offset in the file
     bool hasBlock = false;
 
     class Iterator {
@@ -102,7 +134,9 @@ struct Record {
     /// The first record of that name below this one; null when there is none.
     [[nodiscard]] const Record* child(std::string_view childName) const;
     /// The value at an index, or a value of type none.
-    [[nodiscard]] const Value& value(std::size_t index) const;
+    [[nodiscard]] const Value& value(std::size_t index) const {
+        return index < values.size() ? values[index] : kNoValue;
+    }
     /// The first value of the child of that name, or a value of type none.
     [[nodiscard]] const Value& childValue(std::string_view childName) const;
 
@@ -135,7 +169,8 @@ public:
     std::uint32_t version = 0;
     bool ascii = false;
     bool bigEndian = false;
-    std::string fileName; ///< as given to readRecords, for messages
+    std::span<const char> source{}; ///< all of an ASCII file; empty for a binary one
+    std::string fileName;           ///< as given to readRecords, for messages
     std::uint64_t fileSize = 0;
     Record root; ///< without name and values; its children are the top-level records
 
@@ -143,16 +178,41 @@ public:
     [[nodiscard]] std::string placeOf(const Record& record) const;
 
     // What readers (and the translation of old generations) build records with. Memory is released with the tree.
-    Record& newRecord(std::string_view name);
-    std::span<Value> newValues(std::size_t count);
-    StoredArray& newArray();
+    Record& newRecord(std::string_view name) {
+        auto* const record = new (allocate<Record>(1)) Record;
+        record->name = name;
+        return *record;
+    }
+    std::span<Value> newValues(std::size_t count) {
+        auto* const values = static_cast<Value*>(allocate<Value>(count));
+        std::uninitialized_default_construct_n(values, count);
+        return {values, count};
+    }
+    StoredArray& newArray() { return *new (allocate<StoredArray>(1)) StoredArray; }
     std::string_view keepText(std::string text);
 
     std::shared_ptr<const void> mapping;   ///< keeps the bytes alive
     std::shared_ptr<const FileBytes> file; ///< the bytes, when they are those of a file
 
 private:
-    std::pmr::monotonic_buffer_resource mMemory{64 * 1024};
+    // Released without destructors.
+    template <class T>
+    [[nodiscard]] void* allocate(std::size_t count) {
+        static_assert(std::is_trivially_destructible_v<T> && alignof(T) == kAlignment);
+        if (count * sizeof(T) > mFree.size()) {
+            addBlock(count * sizeof(T));
+        }
+        void* const place = mFree.data();
+        mFree = mFree.subspan(count * sizeof(T));
+        return place;
+    }
+    void addBlock(std::size_t leastSize);
+
+    static constexpr std::size_t kAlignment = alignof(std::uint64_t);
+
+    std::pmr::monotonic_buffer_resource mMemory;
+    std::span<std::byte> mFree;                     ///< of the last block
+    std::size_t mBlockSize = std::size_t{16} << 10; ///< of the next one, at least
     std::deque<std::string> mTexts;
 };
 

@@ -8,6 +8,7 @@
 
 #include "container/BinaryReader.h"
 #include "container/FileBytes.h"
+#include "container/LineCounter.h"
 #include "container/Record.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -93,7 +94,8 @@ bool FileRecord::readNumbers(std::int64_t* destination, std::size_t count) const
     return mRecord->readNumbers(std::span(destination, count));
 }
 
-RecordFile::RecordFile(std::unique_ptr<detail::RecordTree> tree) : mTree(std::move(tree)) {}
+RecordFile::RecordFile(std::unique_ptr<detail::RecordTree> tree)
+    : mTree(std::move(tree)), mLines(std::make_unique<detail::LineCounter>(mTree->source)) {}
 RecordFile::~RecordFile() = default;
 
 std::unique_ptr<RecordFile> RecordFile::open(const char* fileName, FbxStatus& status) {
@@ -106,6 +108,8 @@ bool RecordFile::isAscii() const { return mTree->ascii; }
 bool RecordFile::isBigEndian() const { return mTree->bigEndian; }
 std::uint64_t RecordFile::size() const { return mTree->fileSize; }
 FileRecord RecordFile::first() const { return FileRecord(mTree->root.firstChild); }
+
+std::uint64_t RecordFile::lineOf(const FileRecord& record) { return isAscii() ? mLines->lineAt(record.location()) : 0; }
 
 std::uint64_t RecordFile::endOf(const FileRecord& record) const {
     return mTree->ascii || !mTree->file ? 0 : detail::binaryRecordEnd(mTree->file->bytes(), *mTree, record.record());

@@ -5,11 +5,8 @@
 #include "container/Record.h"
 
 #include <algorithm>
-#include <bit>
-#include <limits>
-#include <new>
-#include <type_traits>
 
+#include "container/LineCounter.h"
 #include "container/NumberConversion.h"
 #include "container/NumberDecoding.h"
 
@@ -17,12 +14,6 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
 namespace {
-
-constexpr Value kNoValue{};
-
-// The tree's memory is released without destructors.
-static_assert(std::is_trivially_destructible_v<Record> && std::is_trivially_destructible_v<Value> &&
-              std::is_trivially_destructible_v<StoredArray>);
 
 bool isNumeric(const Value& value) { return value.isNumber(); }
 
@@ -65,41 +56,6 @@ bool read(const Record& record, std::span<Number> destination) {
 
 } // namespace
 
-Value Value::ofInteger(std::int64_t number) {
-    Value value;
-    value.type = Type::integer;
-    value.integer = number;
-    return value;
-}
-
-Value Value::ofReal(double number) {
-    Value value;
-    value.type = Type::real;
-    value.real = number;
-    return value;
-}
-
-Value Value::ofText(std::string_view text) {
-    Value value;
-    value.type = Type::text;
-    value.text = text;
-    return value;
-}
-
-Value Value::ofWord(std::string_view word) {
-    Value value;
-    value.type = Type::word;
-    value.text = word;
-    return value;
-}
-
-Value Value::ofArray(const StoredArray& array) {
-    Value value;
-    value.type = Type::array;
-    value.array = &array;
-    return value;
-}
-
 std::int64_t Value::toInteger(std::int64_t fallback) const {
     switch (type) {
     case Type::integer:
@@ -134,10 +90,6 @@ double Value::toReal(double fallback) const {
     return fallback;
 }
 
-std::string_view Value::toText() const {
-    return type == Type::text || type == Type::raw || type == Type::word ? text : std::string_view();
-}
-
 char Value::toLetter() const {
     return (type == Type::text || type == Type::word) && text.size() == 1 ? text.front() : '\0';
 }
@@ -150,8 +102,6 @@ const Record* Record::child(std::string_view childName) const {
     }
     return nullptr;
 }
-
-const Value& Record::value(std::size_t index) const { return index < values.size() ? values[index] : kNoValue; }
 
 const Value& Record::childValue(std::string_view childName) const {
     const Record* const record = child(childName);
@@ -178,26 +128,16 @@ bool Record::readNumbers(std::span<std::int64_t> destination) const { return rea
 bool Record::readFloatBits(std::span<std::uint32_t> destination) const { return read(*this, destination); }
 
 std::string RecordTree::placeOf(const Record& record) const {
-    return (ascii ? "line " : "offset ") + std::to_string(record.location);
+    if (!ascii)
+        return "offset " + std::to_string(record.location);
+    return "line " + std::to_string(LineCounter(source).lineAt(record.location));
 }
 
-Record& RecordTree::newRecord(std::string_view name) {
-    auto* const record = new (mMemory.allocate(sizeof(Record), alignof(Record))) Record;
-    record->name = name;
-    return *record;
-}
-
-std::span<Value> RecordTree::newValues(std::size_t count) {
-    if (count == 0) {
-        return {};
-    }
-    auto* const values = static_cast<Value*>(mMemory.allocate(count * sizeof(Value), alignof(Value)));
-    std::uninitialized_default_construct_n(values, count);
-    return {values, count};
-}
-
-StoredArray& RecordTree::newArray() {
-    return *new (mMemory.allocate(sizeof(StoredArray), alignof(StoredArray))) StoredArray;
+void RecordTree::addBlock(std::size_t leastSize) {
+    constexpr std::size_t kLargestSize = std::size_t{1} << 20;
+    const std::size_t size = std::max(leastSize, mBlockSize);
+    mFree = {static_cast<std::byte*>(mMemory.allocate(size, kAlignment)), size};
+    mBlockSize = std::min(2 * mBlockSize, kLargestSize);
 }
 
 std::string_view RecordTree::keepText(std::string text) { return mTexts.emplace_back(std::move(text)); }

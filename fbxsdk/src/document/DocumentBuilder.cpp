@@ -90,7 +90,8 @@ void DocumentBuilder::warn(std::string sentence) {
 }
 
 void DocumentBuilder::warn(const Record& record, const std::string& sentence) {
-    warn(tree().placeOf(record) + ": " + sentence);
+    const bool isListed = mDocument->warnings.size() < kMostWarnings; // lines take time to count
+    warn(isListed ? tree().placeOf(record) + ": " + sentence : sentence);
 }
 
 std::span<const Value> DocumentBuilder::keep(std::initializer_list<Value> values) { return mDocument->keep(values); }

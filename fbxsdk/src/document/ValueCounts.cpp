@@ -63,10 +63,12 @@ struct ListRow {
 constexpr ListRow kLists[] = {{"Properties70", "P", 4}, {"Properties60", "Property", 3}};
 
 bool hasTooMany(const Record& line, std::size_t texts) {
+    if (line.values.size() < texts + 2) // every type holds one number
+        return false;
     const auto* const type = std::find_if(std::begin(kTypes), std::end(kTypes),
                                           [&](const TypeRow& row) { return row.typeName == line.value(1).toText(); });
     const bool user = line.value(texts - 1).toText().find(kUserFlagLetter) != std::string_view::npos;
-    if (type == std::end(kTypes) || user || line.values.size() <= texts)
+    if (type == std::end(kTypes) || user)
         return false;
     const auto values = line.values.subspan(texts);
     const auto numbers =

@@ -18,6 +18,7 @@ FBXSDK_NAMESPACE_BEGIN
 
 namespace detail {
 struct Record;
+class LineCounter;
 class RecordTree;
 } // namespace detail
 
@@ -66,7 +67,7 @@ public:
     /// Whether there is a record; the other calls need one.
     explicit operator bool() const { return mRecord != nullptr; }
     [[nodiscard]] std::string_view name() const; ///< As the file has it; valid as long as the file.
-    /// The offset of its first byte in a binary file, the number of its line in an ASCII one.
+    /// The offset of its first byte in the file.
     [[nodiscard]] std::uint64_t location() const;
     /// Whether a block follows its values, which may be empty.
     [[nodiscard]] bool hasBlock() const;
@@ -104,12 +105,16 @@ public:
     [[nodiscard]] std::uint64_t size() const; ///< Bytes of the file.
     /// The first record of the top level.
     [[nodiscard]] FileRecord first() const;
+    /// The number of the line in an ASCII file that the record starts on, from 1; 0 in a binary one. Quick for records
+    /// in the order of the file.
+    [[nodiscard]] std::uint64_t lineOf(const FileRecord& record);
     /// The offset behind the record and its block in a binary file; 0 in an ASCII one.
     [[nodiscard]] std::uint64_t endOf(const FileRecord& record) const;
 
 private:
     explicit RecordFile(std::unique_ptr<detail::RecordTree> tree);
     std::unique_ptr<detail::RecordTree> mTree;
+    std::unique_ptr<detail::LineCounter> mLines;
 };
 
 } // namespace extensions
