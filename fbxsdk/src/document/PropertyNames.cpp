@@ -6,8 +6,8 @@
 
 #include <algorithm>
 #include <iterator>
-#include <set>
 
+#include "schema/NameIndex.h"
 #include "schema/OldNames.h"
 #include "schema/PropertyFlags.h"
 #include "schema/Schema.h"
@@ -23,13 +23,8 @@ constexpr std::pair<std::string_view, std::string_view> kAttributeFlags[] = {
 } // namespace
 
 bool isModelProperty(std::string_view name) {
-    static const std::set<std::string_view> names = [] {
-        std::set<std::string_view> all;
-        for (const PropertyRow& row : kNodeRows)
-            all.insert(row.name);
-        return all;
-    }();
-    return names.contains(name);
+    static const NameIndex names(kNodeRows, [](const PropertyRow& row) { return row.name; });
+    return names.find(NameKey(name)) >= 0;
 }
 
 std::string_view modernPropertyName(std::string_view subClass, std::string_view name) {

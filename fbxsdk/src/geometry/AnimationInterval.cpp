@@ -37,7 +37,7 @@ public:
 private:
     void visitProperties(FbxObject& object) {
         // Only properties that somebody connected something to can be animated.
-        for (const auto& property : object.data().properties) {
+        for (const detail::PropertyData* property : object.data().properties()) {
             for (const detail::ConnectionPoint* source : property->plug.sources) {
                 if (source->property < 0)
                     visitSource(*source->object);

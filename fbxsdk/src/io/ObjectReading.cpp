@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <string>
+#include <unordered_map>
 
 #include <fbxsdk/FbxAnimCurve.h>
 #include <fbxsdk/FbxAnimCurveNode.h>
@@ -44,19 +45,22 @@ struct Reading {
 std::string textOf(const Value& value) { return std::string(value.toText()); }
 
 void readNode(const Reading& reading) {
-    auto& node = reading.as<FbxNode>();
     if (const char letter = reading.record("Shading").toLetter())
-        node.SetShadingMode(static_cast<FbxNode::EShadingMode>(numberOf(kShadingModes, letter, FbxNode::eHardShading)));
-    // A file whose class defaults and objects both leave the flag out means its rotations to be in force.
+        reading.as<FbxNode>().SetShadingMode(
+            static_cast<FbxNode::EShadingMode>(numberOf(kShadingModes, letter, FbxNode::eHardShading)));
+}
+
+/// A file whose class defaults and objects both leave the flag out means its rotations to be in force.
+void readNodeProperties(const Reading& reading) {
     const bool stated = reading.source.property("RotationActive") != nullptr ||
                         std::any_of(reading.document->templates.begin(), reading.document->templates.end(),
                                     [](const DocumentTemplate& each) { return each.className == "FbxNode"; });
     if (!stated)
-        node.SetRotationActive(true);
+        reading.as<FbxNode>().SetRotationActive(true);
 }
 
 /// Cameras of old writers state position, up and interest as records only.
-void readCamera(const Reading& reading) {
+void readCameraProperties(const Reading& reading) {
     constexpr struct {
         const char* property;
         const char* record;
@@ -92,7 +96,7 @@ void readCurveNode(const Reading& reading) {
 
 void readCurveKeys(const Reading& reading) { reading.as<FbxAnimCurve>().setSource(reading.document, reading.source); }
 
-void readMaterial(const Reading& reading) {
+void readMaterialProperties(const Reading& reading) {
     const std::string model = textOf(reading.record("ShadingModel"));
     if (!model.empty())
         reading.as<FbxSurfaceMaterial>().ShadingModel.Set(FbxString(model.c_str()));
@@ -120,16 +124,63 @@ struct ClassReader {
 
 const ClassReader kReaders[] = {
     {FbxNode::ClassId, readNode},
-    {FbxCamera::ClassId, readCamera},
     {FbxSkeleton::ClassId, readSkeleton},
     {FbxMarker::ClassId, readMarker},
     {FbxGeometryBase::ClassId, readGeometry},
     {FbxDeformer::ClassId, readAnyDeformer},
     {FbxSubDeformer::ClassId, readAnyDeformer},
-    {FbxSurfaceMaterial::ClassId, readMaterial},
     {FbxFileTexture::ClassId, readFileTexture},
     {FbxAnimCurveNode::ClassId, readCurveNode},
     {FbxAnimCurve::ClassId, readCurveKeys},
+};
+
+/// With the object's properties, behind those that the file lists as such.
+const ClassReader kPropertyReaders[] = {
+    {FbxNode::ClassId, readNodeProperties},
+    {FbxCamera::ClassId, readCameraProperties},
+    {FbxSurfaceMaterial::ClassId, readMaterialProperties},
+};
+
+void applyReaders(std::span<const ClassReader> readers, const Reading& reading) {
+    const FbxClassId id = reading.object.GetClassId();
+    for (const ClassReader& reader : readers) {
+        if (id.Is(reader.id))
+            reader.read(reading);
+    }
+}
+
+/// Properties of the objects of one document, which lists them in this order.
+class DocumentProperties final : public PropertySource {
+public:
+    explicit DocumentProperties(std::shared_ptr<const Document> document) : mDocument(std::move(document)) {}
+
+    void read(FbxObject& object, std::size_t place) const override {
+        const DocumentObject& source = mDocument->objects[place];
+        readTemplates(object);
+        // The channels of curve nodes are no properties.
+        if (!object.Is<FbxAnimCurveNode>())
+            readProperties(object, source.properties);
+        applyReaders(kPropertyReaders, {mDocument, source, object});
+    }
+
+private:
+    void readTemplates(FbxObject& object) const {
+        const ClassInfo* const info = object.GetClassId().info();
+        if (const auto known = mTemplates.find(info); known != mTemplates.end()) {
+            applyTemplate(object, known->second);
+            return;
+        }
+        std::vector<TemplateLine> lines;
+        for (const DocumentTemplate& each : mDocument->templates) {
+            if (each.className == object.GetClassId().GetName())
+                readTemplate(object, each.properties, lines);
+        }
+        mTemplates.emplace(info, std::move(lines));
+    }
+
+    std::shared_ptr<const Document> mDocument;
+    /// What the file's class defaults change, by class; worked out with the first object.
+    mutable std::unordered_map<const ClassInfo*, std::vector<TemplateLine>> mTemplates;
 };
 
 bool sameText(std::string_view a, std::string_view b) {
@@ -152,7 +203,7 @@ FbxClassId materialClass(const DocumentObject& source) {
 } // namespace
 
 ObjectReader::ObjectReader(std::shared_ptr<const Document> document, FbxScene& scene)
-    : mDocument(std::move(document)), mScene(scene) {}
+    : mDocument(std::move(document)), mProperties(std::make_shared<DocumentProperties>(mDocument)), mScene(scene) {}
 ObjectReader::~ObjectReader() = default;
 
 FbxClassId ObjectReader::classOf(const DocumentObject& source) {
@@ -166,18 +217,6 @@ FbxClassId ObjectReader::classOf(const DocumentObject& source) {
     return mLastSchema ? mLastSchema->classId() : FbxClassId();
 }
 
-void ObjectReader::readTemplates(FbxObject& object) {
-    const auto [known, isNew] = mTemplates.try_emplace(object.GetClassId().info());
-    if (!isNew) {
-        applyTemplate(object, known->second);
-        return;
-    }
-    for (const DocumentTemplate& each : mDocument->templates) {
-        if (each.className == object.GetClassId().GetName())
-            readTemplate(object, each.properties, known->second);
-    }
-}
-
 FbxObject* ObjectReader::read(const DocumentObject& source) {
     const FbxClassId id = classOf(source);
     if (!id.IsValid())
@@ -186,14 +225,8 @@ FbxObject* ObjectReader::read(const DocumentObject& source) {
     if (!object)
         return nullptr;
     object->data().fileId = source.id;
-    readTemplates(*object);
-    // The channels of curve nodes are no properties.
-    if (!object->Is<FbxAnimCurveNode>())
-        readProperties(*object, source.properties);
-    for (const ClassReader& reader : kReaders) {
-        if (id.Is(reader.id))
-            reader.read({mDocument, source, *object});
-    }
+    object->data().readPropertiesLater(mProperties, static_cast<std::size_t>(&source - mDocument->objects.data()));
+    applyReaders(kReaders, {mDocument, source, *object});
     return object;
 }
 

@@ -7,7 +7,6 @@
 #include <memory>
 #include <span>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 #include "document/Document.h"
@@ -34,7 +33,7 @@ struct TemplateLine {
 void readTemplate(FbxObject& object, std::span<const DocumentProperty> properties, std::vector<TemplateLine>& lines);
 void applyTemplate(FbxObject& object, std::span<const TemplateLine> lines);
 
-/// Objects of one document, one after the other.
+/// Objects of one document, one after the other. Their properties are read when they are asked for.
 class ObjectReader {
 public:
     ObjectReader(std::shared_ptr<const Document> document, FbxScene& scene);
@@ -47,12 +46,10 @@ public:
 
 private:
     [[nodiscard]] FbxClassId classOf(const DocumentObject& source);
-    void readTemplates(FbxObject& object);
 
     std::shared_ptr<const Document> mDocument;
+    std::shared_ptr<const PropertySource> mProperties;
     FbxScene& mScene;
-    /// What the file's class defaults change, by class; worked out with the first object.
-    std::unordered_map<const ClassInfo*, std::vector<TemplateLine>> mTemplates;
     // Objects of one kind mostly come in a row.
     std::string_view mLastRecord, mLastSubClass;
     const SchemaClass* mLastSchema = nullptr;

@@ -9,8 +9,10 @@
 #include <string>
 
 #include <fbxsdk/FbxObject.h>
+#include <fbxsdk/FbxTime.h>
 
 #include "object/ObjectData.h"
+#include "object/PropertyConversion.h"
 #include "schema/PropertyFlags.h"
 #include "schema/PropertyTypes.h"
 
@@ -26,39 +28,35 @@ FbxDouble4 numbersOf(const DocumentProperty& line) {
     return numbers;
 }
 
-void setValue(FbxProperty& property, const DocumentProperty& line) {
-    if (line.values.empty())
-        return;
+void setValue(PropertyData& property, const DocumentProperty& line) {
     const Value& first = line.values.front();
-    switch (property.GetPropertyDataType().GetType()) {
+    const EFbxType type = property.type.GetType();
+    const auto write = [&](EFbxType given, const auto& value) {
+        writePropertyValue(property.value, type, &value, given);
+    };
+    switch (type) {
     case eFbxString:
     case eFbxDateTime:
-        property.Set(FbxString(first.text.data(), first.text.size()));
+        property.value.text = first.text;
         break;
     case eFbxTime:
-        property.Set(FbxTime(first.toInteger()));
+        write(eFbxTime, FbxTime(first.toInteger()));
         break;
     case eFbxDouble2:
     case eFbxDouble3:
     case eFbxDouble4:
-        property.Set(numbersOf(line));
+        write(eFbxDouble4, numbersOf(line));
         break;
     case eFbxFloat:
     case eFbxDouble:
     case eFbxHalfFloat:
     case eFbxDistance:
-        property.Set(first.toReal());
+        write(eFbxDouble, first.toReal());
         break;
     default:
-        property.Set(FbxLongLong{first.toInteger()});
+        write(eFbxLongLong, FbxLongLong{first.toInteger()});
         break;
     }
-}
-
-/// Adds to those of the class.
-void setFlags(FbxProperty& property, std::string_view flags) {
-    if (const unsigned stated = propertyFlags(flags); stated != 0)
-        property.ModifyFlag(static_cast<FbxPropertyFlags::EFlags>(stated), true);
 }
 
 /// Whether the line says what the class's row says already, so that nothing needs to be stored.
@@ -76,23 +74,22 @@ bool isDefault(const FbxObject& object, int index, const DocumentProperty& line)
     return true;
 }
 
-void set(FbxProperty property, const DocumentProperty& line) {
-    setValue(property, line);
-    setFlags(property, line.flags);
+/// Flags add to those of the class.
+void set(PropertyData& property, const DocumentProperty& line) {
+    if (!line.values.empty())
+        setValue(property, line);
+    property.flags |= propertyFlags(line.flags);
 }
 
 void readProperty(FbxObject& object, const DocumentProperty& line) {
-    const int index = object.data().findProperty(line.name);
+    ObjectData& data = object.data();
+    const int index = data.findProperty(NameKey(line.name));
     if (index >= 0) {
         if (!isDefault(object, index, line))
-            set({&object, index}, line);
-        return;
+            set(data.materialise(index), line);
+    } else if (!line.name.empty()) {
+        set(data.appendProperty(dataTypeOf(line.typeName, line.subTypeName), std::string(line.name)), line);
     }
-    if (line.name.empty())
-        return;
-    const FbxProperty property = FbxProperty::Create(&object, dataTypeOf(line.typeName, line.subTypeName),
-                                                     std::string(line.name).c_str(), "", /*pCheckForDup=*/false);
-    set(property, line);
 }
 
 } // namespace
@@ -104,17 +101,17 @@ void readProperties(FbxObject& object, std::span<const DocumentProperty> propert
 
 void readTemplate(FbxObject& object, std::span<const DocumentProperty> properties, std::vector<TemplateLine>& lines) {
     for (const DocumentProperty& line : properties) {
-        const int index = object.data().findProperty(line.name);
+        const int index = object.data().findProperty(NameKey(line.name));
         if (index < 0 || isDefault(object, index, line))
             continue;
-        set({&object, index}, line);
+        set(object.data().materialise(index), line);
         lines.push_back({index, &line});
     }
 }
 
 void applyTemplate(FbxObject& object, std::span<const TemplateLine> lines) {
     for (const auto& [index, line] : lines)
-        set({&object, index}, *line);
+        set(object.data().materialise(index), *line);
 }
 
 } // namespace detail

@@ -132,12 +132,12 @@ std::vector<DocumentProperty> writableProperties(const FbxObject& object, Proper
     std::vector<DocumentProperty> lines;
     const ObjectData& data = object.data();
     const std::span<const PropertyRow> rows = data.info->rows;
-    auto next = data.properties.begin();
+    auto next = data.properties().begin();
     for (int index = 0; index < data.propertyCount(); ++index) {
-        if (next == data.properties.end() && choice == PropertyChoice::changed)
+        if (next == data.properties().end() && choice == PropertyChoice::changed)
             break;
-        const bool stored = next != data.properties.end() && (*next)->index == index;
-        const PropertyData* property = stored ? (next++)->get() : nullptr;
+        const bool stored = next != data.properties().end() && (*next)->index == index;
+        const PropertyData* property = stored ? *next++ : nullptr;
         if (property && (property->flags & FbxPropertyFlags::eNotSavable) != 0)
             continue;
         if (property && (choice == PropertyChoice::all || isChanged(*property)))

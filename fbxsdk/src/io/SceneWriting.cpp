@@ -134,7 +134,7 @@ private:
             if (!source->object->Is<FbxAnimCurve>() || !destination.Is<FbxAnimCurveNode>())
                 add(rankOf(*source->object, destination), idOf(*source->object), id, nameOf(*source));
         }
-        for (const auto& property : destination.data().properties) {
+        for (const PropertyData* property : destination.data().properties()) {
             for (const ConnectionPoint* source : property->plug.sources)
                 add(kOthers, idOf(*source->object), id, nameOf(*source), propertyName(destination, property->index));
         }

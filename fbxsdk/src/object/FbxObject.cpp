@@ -82,7 +82,10 @@ FbxManager* FbxObject::GetFbxManager() const { return mData->manager; }
 FbxScene* FbxObject::GetScene() const { return mData->scene; }
 
 FbxProperty FbxObject::FindProperty(const char* pName, bool pCaseSensitive) const {
-    const int index = pName ? mData->findProperty(pName, pCaseSensitive) : -1;
+    if (!pName)
+        return {};
+    const int index = pCaseSensitive ? mData->findProperty(detail::NameKey(std::string_view(pName)))
+                                     : mData->findPropertyInAnyCase(pName);
     return index < 0 ? FbxProperty() : FbxProperty(const_cast<FbxObject*>(this), index);
 }
 

@@ -49,7 +49,7 @@ FbxProperty compoundOf(const FbxProperty& property) {
     std::string_view name = fullName(property);
     for (std::size_t bar = name.rfind('|'); bar != std::string_view::npos; bar = name.rfind('|')) {
         name = name.substr(0, bar);
-        const int index = property.GetFbxObject()->data().findProperty(name);
+        const int index = property.GetFbxObject()->data().findProperty(detail::NameKey(name));
         if (index >= 0)
             return {property.GetFbxObject(), index};
     }
@@ -146,15 +146,11 @@ void FbxProperty::readValue(void* pValue, EFbxType pType) const {
 bool FbxProperty::writeValue(const void* pValue, EFbxType pType) {
     if (!exists(*this))
         return false;
-    if (PropertyData* stored = mObject->data().property(mIndex)) {
-        if (!detail::writePropertyValue(stored->value, stored->type.GetType(), pValue, pType))
-            return false;
-    } else {
-        detail::PropertyValue value = detail::defaultValue(*rowOf(*this));
-        if (!detail::writePropertyValue(value, rowOf(*this)->type->GetType(), pValue, pType))
-            return false;
-        editable(*this).value = std::move(value);
-    }
+    if (!detail::isWritable(GetPropertyDataType().GetType(), pType))
+        return false;
+    PropertyData& stored = editable(*this);
+    if (!detail::writePropertyValue(stored.value, stored.type.GetType(), pValue, pType))
+        return false;
     ++mObject->GetFbxManager()->data().revision;
     return true;
 }

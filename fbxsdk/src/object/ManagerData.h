@@ -12,6 +12,7 @@
 #include <fbxsdk/FbxManager.h>
 
 #include "object/ObjectData.h"
+#include "object/Slab.h"
 
 FBXSDK_NAMESPACE_BEGIN
 class FbxIOPluginRegistry;
@@ -47,6 +48,7 @@ public:
     void leave(FbxObject& object);
 
     std::vector<FbxObject*> objects;
+    Slab<PropertyData> properties; ///< of all objects
     bool tearingDown = false;
     FbxIOSettings* settings = nullptr; ///< an object, which may be freed first
     /// Grows with every change of a value, a key or a connection; evaluation caches compare it.

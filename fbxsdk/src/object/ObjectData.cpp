@@ -8,7 +8,6 @@
 #include <new>
 
 #include "object/ManagerData.h"
-#include "object/RowIndex.h"
 #include "schema/PropertyFlags.h"
 #include "schema/Schema.h"
 
@@ -16,27 +15,31 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-bool equalNames(std::string_view a, std::string_view b, bool caseSensitive) {
-    if (caseSensitive)
-        return a == b;
+bool equalInAnyCase(std::string_view a, std::string_view b) {
     const auto lower = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c; };
     return std::equal(a.begin(), a.end(), b.begin(), b.end(), [&](char x, char y) { return lower(x) == lower(y); });
 }
 
-int anyCaseRow(std::span<const PropertyRow> rows, std::string_view name) {
-    for (std::size_t i = 0; i < rows.size(); ++i) {
-        if (equalNames(rows[i].name, name, /*caseSensitive*/ false))
-            return static_cast<int>(i);
-    }
-    return -1;
-}
-
 void noteChange(const FbxObject& object) { ++object.GetFbxManager()->data().revision; }
 
-static_assert(kCameraStereoRows.size() <= RowIndex::kMostRows, "no class has more");
+static_assert(kCameraStereoRows.size() <= NameIndex::kMostRows, "no class has more");
 
 /// So many dynamic properties are searched one by one; more get an index.
 constexpr std::size_t kUnindexedProperties = 32;
+
+void assignDefault(PropertyValue& value, const PropertyRow& row) {
+    value.numbers = row.numbers;
+    value.integer = static_cast<std::int64_t>(row.numbers[0]);
+    if (*row.text != '\0')
+        value.text = row.text;
+}
+
+/// For one more, so that what is made for it is never lost.
+void makeRoom(std::vector<PropertyData*>& list) {
+    constexpr std::size_t kFirst = 8;
+    if (list.size() == list.capacity())
+        list.reserve(std::max(kFirst, 2 * list.size()));
+}
 
 bool betweenObjects(const ConnectionPoint& source, const ConnectionPoint& destination) {
     return source.property < 0 && destination.property < 0;
@@ -44,87 +47,147 @@ bool betweenObjects(const ConnectionPoint& source, const ConnectionPoint& destin
 
 } // namespace
 
-int ClassInfo::findRow(std::string_view rowName) const {
-    const RowIndex* known = index.load(std::memory_order_acquire);
+int ClassInfo::findRow(const NameKey& rowName) const {
+    const NameIndex* known = index.load(std::memory_order_acquire);
     if (!known) {
         // Several threads may be here at once: one of their tables stays.
-        std::unique_ptr<const RowIndex> made(new (std::nothrow) RowIndex(rows));
-        if (!made)
-            return rowIndex(rows, rowName);
+        std::unique_ptr<const NameIndex> made;
+        try {
+            made = std::make_unique<NameIndex>(rows, [](const PropertyRow& row) { return row.name; });
+        } catch (const std::bad_alloc&) {
+            return rowIndex(rows, rowName.text);
+        }
         known = index.compare_exchange_strong(known, made.get()) ? made.release() : known;
     }
     return known->find(rowName);
 }
 
-int ObjectData::findProperty(std::string_view propertyName, bool caseSensitive) const {
-    if (const int row = caseSensitive ? info->findRow(propertyName) : anyCaseRow(info->rows, propertyName); row >= 0)
-        return row;
-    if (dynamicIndex && caseSensitive) {
-        const auto found = dynamicIndex->find(propertyName);
-        return found == dynamicIndex->end() ? -1 : found->second;
+ObjectData::~ObjectData() { dropProperties(); }
+
+void ObjectData::readPropertiesLater(std::shared_ptr<const PropertySource> source, std::size_t place) {
+    mUnread = std::move(source);
+    mUnreadPlace = place;
+}
+
+void ObjectData::readFromSource() {
+    std::uint64_t& revision = manager->data().revision;
+    const std::uint64_t before = revision;
+    const std::shared_ptr<const PropertySource> source = std::move(mUnread); // it asks for properties itself
+    try {
+        source->read(*plug.object, mUnreadPlace);
+    } catch (...) {
+        dropProperties();
+        mUnread = source;
+        revision = before;
+        throw;
     }
-    for (const PropertyData* property : dynamicProperties) {
-        if (equalNames(property->name, propertyName, caseSensitive))
+    revision = before; // every answer is what it would have been before
+}
+
+void ObjectData::dropProperties() noexcept {
+    for (PropertyData* each : mProperties)
+        manager->data().properties.free(each);
+    mProperties.clear();
+    mDynamicProperties.clear();
+    mDynamicIndex.reset();
+}
+
+int ObjectData::findProperty(const NameKey& propertyName) const {
+    if (const int row = info->findRow(propertyName); row >= 0)
+        return row;
+    readUnread();
+    if (mDynamicIndex) {
+        const auto found = mDynamicIndex->find(propertyName.text);
+        return found == mDynamicIndex->end() ? -1 : found->second;
+    }
+    for (const PropertyData* property : mDynamicProperties) {
+        if (property->name == propertyName.text)
             return property->index;
     }
     return -1;
 }
 
+int ObjectData::findPropertyInAnyCase(std::string_view propertyName) const {
+    for (std::size_t i = 0; i < info->rows.size(); ++i) {
+        if (equalInAnyCase(info->rows[i].name, propertyName))
+            return static_cast<int>(i);
+    }
+    readUnread();
+    for (const PropertyData* property : mDynamicProperties) {
+        if (equalInAnyCase(property->name, propertyName))
+            return property->index;
+    }
+    return -1;
+}
+
+ObjectData::PropertyPlace ObjectData::placeOf(int index) const {
+    readUnread();
+    // Files state properties in the order of their rows: most are made behind all others.
+    if (mProperties.empty() || mProperties.back()->index < index)
+        return mProperties.end();
+    return std::lower_bound(mProperties.begin(), mProperties.end(), index,
+                            [](const PropertyData* each, int wanted) { return each->index < wanted; });
+}
+
 PropertyData* ObjectData::property(int index) const {
-    const auto place = std::lower_bound(properties.begin(), properties.end(), index,
-                                        [](const auto& each, int wanted) { return each->index < wanted; });
-    return place != properties.end() && (*place)->index == index ? place->get() : nullptr;
+    const auto place = placeOf(index);
+    return place != mProperties.end() && (*place)->index == index ? *place : nullptr;
 }
 
 PropertyData& ObjectData::materialise(int index) {
-    const auto place = std::lower_bound(properties.begin(), properties.end(), index,
-                                        [](const auto& each, int wanted) { return each->index < wanted; });
-    if (place != properties.end() && (*place)->index == index)
+    const auto place = placeOf(index);
+    if (place != mProperties.end() && (*place)->index == index)
         return **place;
-    auto made = std::make_unique<PropertyData>();
     const PropertyRow& row = info->rows[static_cast<std::size_t>(index)];
+    PropertyData& made = insertProperty(place, index, *row.type);
+    made.row = &row;
+    made.flags = defaultFlags(row);
+    assignDefault(made.value, row);
+    return made;
+}
+
+PropertyData& ObjectData::insertProperty(PropertyPlace place, int index, const FbxDataType& type) {
+    const auto position = place - mProperties.begin();
+    makeRoom(mProperties);
+    PropertyData* const made = manager->data().properties.make();
     made->index = index;
-    made->row = &row;
-    made->type = *row.type;
-    made->flags = defaultFlags(row);
-    made->value = defaultValue(row);
+    made->type = type;
     made->plug.object = plug.object;
     made->plug.property = index;
-    return **properties.insert(place, std::move(made));
+    mProperties.insert(mProperties.begin() + position, made);
+    return *made;
 }
 
 PropertyData& ObjectData::appendProperty(const FbxDataType& type, std::string propertyName) {
-    auto made = std::make_unique<PropertyData>();
-    made->index = propertyCount();
-    made->type = type;
-    made->name = std::move(propertyName);
-    made->plug.object = plug.object;
-    made->plug.property = made->index;
-    dynamicProperties.push_back(made.get());
-    properties.push_back(std::move(made));
+    readUnread();
+    makeRoom(mDynamicProperties);
+    PropertyData& made = insertProperty(mProperties.end(), propertyCount(), type);
+    made.name = std::move(propertyName);
+    mDynamicProperties.push_back(&made);
     indexDynamicProperties();
-    return *properties.back();
+    return made;
 }
 
 void ObjectData::indexDynamicProperties() {
-    if (dynamicProperties.size() <= kUnindexedProperties)
+    if (mDynamicProperties.size() <= kUnindexedProperties)
         return;
-    if (dynamicIndex) {
-        dynamicIndex->emplace(dynamicProperties.back()->name, dynamicProperties.back()->index);
+    if (mDynamicIndex) {
+        mDynamicIndex->emplace(mDynamicProperties.back()->name, mDynamicProperties.back()->index);
         return;
     }
-    dynamicIndex = std::make_unique<std::unordered_map<std::string_view, int>>();
-    for (const PropertyData* property : dynamicProperties)
-        dynamicIndex->emplace(property->name, property->index);
+    mDynamicIndex = std::make_unique<std::unordered_map<std::string_view, int>>();
+    for (const PropertyData* property : mDynamicProperties)
+        mDynamicIndex->emplace(property->name, property->index);
 }
 
-int ObjectData::propertyCount() const { return static_cast<int>(info->rows.size() + dynamicProperties.size()); }
+int ObjectData::propertyCount() const {
+    readUnread();
+    return static_cast<int>(info->rows.size() + mDynamicProperties.size());
+}
 
 PropertyValue defaultValue(const PropertyRow& row) {
     PropertyValue value;
-    value.numbers = row.numbers;
-    value.integer = static_cast<std::int64_t>(row.numbers[0]);
-    value.text = row.text;
+    assignDefault(value, row);
     return value;
 }
 
@@ -166,9 +229,7 @@ void joinSceneOf(const FbxObject& member, FbxObject& object) {
             for (auto source = sources.rbegin(); source != sources.rend(); ++source)
                 pending.push_back((*source)->object);
         };
-        for (const auto& property : each->data().properties)
-            pushSources(property->plug);
-        pushSources(each->data().plug);
+        each->data().eachPlug(pushSources);
     }
 }
 
@@ -242,9 +303,7 @@ void ObjectData::disconnectFromSurvivors() {
                 disconnect(point, **each);
         }
     };
-    for (const auto& property : properties)
-        cut(property->plug);
-    cut(plug);
+    eachPlug(cut);
 }
 
 } // namespace detail

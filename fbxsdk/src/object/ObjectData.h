@@ -3,9 +3,10 @@
 //
 // What stands behind an object: its class, its name, its properties and its connections.
 //
-// A property of a class costs nothing until somebody changes or connects it: the class's row gives its type and
-// default, and a PropertyData is made on the first write. Properties are addressed by index: the rows of the class
-// first, in their order, then the dynamic ones in order of creation.
+// A property of a class costs nothing until it is changed or connected: the class's row gives its type and default, and
+// a PropertyData is made on the first write. Those of an object from a file are read at the first question about any of
+// them. Properties are addressed by index: the rows of the class first, in their order, then the dynamic ones in order
+// of creation.
 #pragma once
 
 #include <array>
@@ -20,12 +21,11 @@
 #include <fbxsdk/FbxObject.h>
 
 #include "object/ConnectionList.h"
+#include "schema/NameIndex.h"
 #include "schema/PropertyRow.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
-
-class RowIndex;
 
 /// One class of objects. The rows are the whole list of the class, inherited ones included, in file order.
 struct ClassInfo {
@@ -35,10 +35,10 @@ struct ClassInfo {
     /// Makes an object of the class; null for abstract classes.
     FbxObject* (*construct)(FbxManager& manager, const ClassInfo& info) = nullptr;
     /// Made at the first question, and kept for good.
-    mutable std::atomic<const RowIndex*> index = nullptr;
+    mutable std::atomic<const NameIndex*> index = nullptr;
 
     /// The place of the row of that name; -1 when there is none.
-    [[nodiscard]] int findRow(std::string_view rowName) const;
+    [[nodiscard]] int findRow(const NameKey& rowName) const;
 };
 
 /// One end of connections: an object, or one of its properties.
@@ -66,6 +66,16 @@ struct PropertyData {
     const PropertyRow* row = nullptr; ///< null for dynamic ones
 };
 
+/// The properties of objects that were not read yet.
+class PropertySource {
+public:
+    /// Sets the properties of the object that has the place in the source.
+    virtual void read(FbxObject& object, std::size_t place) const = 0;
+
+protected:
+    ~PropertySource() = default;
+};
+
 /// What a scene does for its members.
 class Membership {
 public:
@@ -86,26 +96,36 @@ protected:
 };
 
 struct ObjectData {
+    ObjectData() = default;
+    ObjectData(const ObjectData&) = delete;
+    ObjectData& operator=(const ObjectData&) = delete;
+    ~ObjectData();
+
     const ClassInfo* info = nullptr;
     FbxManager* manager = nullptr;
     FbxScene* scene = nullptr;        ///< null outside of scenes; a scene is a member of itself
     Membership* membership = nullptr; ///< of the same scene
     std::string name;
     ConnectionPoint plug;
-    std::size_t managerSlot = 0;                           ///< place in the manager's list
-    std::vector<std::unique_ptr<PropertyData>> properties; ///< sorted by index
-    std::vector<PropertyData*> dynamicProperties;          ///< in order of creation
-    /// Index by name, once there are many dynamic properties; of several of one name the first.
-    std::unique_ptr<std::unordered_map<std::string_view, int>> dynamicIndex;
-    std::int64_t fileId = 0; ///< id in the file it was read from; 0 if none
-    bool doomed = false;     ///< about to be freed together with others
+    std::size_t managerSlot = 0; ///< place in the manager's list
+    std::int64_t fileId = 0;     ///< id in the file it was read from; 0 if none
+    bool doomed = false;         ///< about to be freed together with others
+
+    /// The properties are those of the source, which is asked for them once. If that fails they stay unread.
+    void readPropertiesLater(std::shared_ptr<const PropertySource> source, std::size_t place);
 
     /// Index by name over the rows of the class and the dynamic properties; -1 when there is none.
-    [[nodiscard]] int findProperty(std::string_view propertyName, bool caseSensitive = true) const;
-    /// The data behind an index; null while the property stands as its row says.
+    [[nodiscard]] int findProperty(const NameKey& propertyName) const;
+    [[nodiscard]] int findPropertyInAnyCase(std::string_view propertyName) const;
+    /// The data behind an index; null while the property is as its row says.
     [[nodiscard]] PropertyData* property(int index) const;
     /// The same, made from the row on first use.
     PropertyData& materialise(int index);
+    /// Those that have data, sorted by index.
+    [[nodiscard]] const std::vector<PropertyData*>& properties() const {
+        readUnread();
+        return mProperties;
+    }
     [[nodiscard]] int propertyCount() const;
     /// A new dynamic property, behind all others.
     PropertyData& appendProperty(const FbxDataType& type, std::string propertyName);
@@ -119,11 +139,35 @@ struct ObjectData {
     /// Tells both objects of a connection between them that was made or cut.
     static void announce(FbxObject& source, FbxObject& destination, bool connected);
     void announceScene(FbxScene* joined);
+    /// Calls with each end that may have connections: those of the properties, then the object's own.
+    template <class Use>
+    void eachPlug(const Use& use) {
+        // What is unread is not connected.
+        for (PropertyData* each : mProperties)
+            use(each->plug);
+        use(plug);
+    }
     /// Cuts the connections to objects that are not doomed.
     void disconnectFromSurvivors();
 
 private:
+    void readUnread() const {
+        if (mUnread)
+            const_cast<ObjectData*>(this)->readFromSource();
+    }
+    void readFromSource();
+    void dropProperties() noexcept;
     void indexDynamicProperties();
+    using PropertyPlace = std::vector<PropertyData*>::const_iterator;
+    [[nodiscard]] PropertyPlace placeOf(int index) const;
+    PropertyData& insertProperty(PropertyPlace place, int index, const FbxDataType& type);
+
+    std::shared_ptr<const PropertySource> mUnread;
+    std::size_t mUnreadPlace = 0;
+    std::vector<PropertyData*> mProperties;        ///< sorted by index; owned, their memory is the manager's
+    std::vector<PropertyData*> mDynamicProperties; ///< in order of creation
+    /// Index by name, once there are many dynamic properties; of several of one name the first.
+    std::unique_ptr<std::unordered_map<std::string_view, int>> mDynamicIndex;
 };
 
 /// Stands for "no property in particular": the parent of all properties of an object.
@@ -140,8 +184,8 @@ void leaveScene(FbxObject& object);
 
 /// A typed member of a class, bound to the row of that name.
 template <class T>
-FbxPropertyT<T> bindProperty(FbxObject& object, const char* name) {
-    return FbxPropertyT<T>(FbxProperty(&object, object.data().findProperty(name)));
+FbxPropertyT<T> bindProperty(FbxObject& object, const NameKey& name) {
+    return FbxPropertyT<T>(FbxProperty(&object, object.data().info->findRow(name)));
 }
 
 } // namespace detail

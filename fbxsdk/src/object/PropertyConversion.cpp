@@ -265,6 +265,16 @@ bool readPropertyValue(const PropertyValue& value, EFbxType from, void* target, 
     return false;
 }
 
+bool isWritable(EFbxType to, EFbxType type) {
+    const Family kept = familyOf(to), given = familyOf(type);
+    if (kept == Family::none || given == Family::none)
+        return false;
+    const bool isText = given == Family::text, isTime = given == Family::time;
+    if (kept == Family::text || isText)
+        return kept == given;
+    return isTime ? kept == Family::time || kept == Family::whole : kept != Family::time || given == Family::whole;
+}
+
 bool writePropertyValue(PropertyValue& value, EFbxType to, const void* source, EFbxType type) {
     switch (familyOf(type)) {
     case Family::text:

@@ -17,6 +17,8 @@ namespace detail {
 bool convertNumbers(const std::array<double, 4>& numbers, void* target, EFbxType type);
 /// A property's value in a caller's variable. False, and the variable untouched, when no conversion exists.
 bool readPropertyValue(const PropertyValue& value, EFbxType from, void* target, EFbxType type);
+/// Whether a property of the type can take a caller's variable of the other one.
+[[nodiscard]] bool isWritable(EFbxType to, EFbxType type);
 /// The other way round: a caller's variable becomes the property's value.
 bool writePropertyValue(PropertyValue& value, EFbxType to, const void* source, EFbxType type);
 

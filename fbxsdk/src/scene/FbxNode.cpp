@@ -195,8 +195,8 @@ FbxNodeAttribute* FbxNode::SetNodeAttribute(FbxNodeAttribute* pNodeAttribute) {
 }
 
 const FbxNodeAttribute* FbxNode::GetNodeAttribute() const {
-    if (mAttributes.empty())
-        return nullptr;
+    if (mAttributes.size() <= 1)
+        return mAttributes.empty() ? nullptr : mAttributes.front();
     const FbxNodeAttribute* chosen = at(mAttributes, propertyOf(*this, nodeRows().defaultAttribute).Get<FbxInt>());
     return chosen ? chosen : mAttributes.front();
 }

@@ -4,6 +4,7 @@
 // Property types: what each holds, and its two type strings in files.
 #include "schema/PropertyTypes.h"
 
+#include "schema/NameIndex.h"
 #include "schema/Schema.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -115,20 +116,24 @@ constexpr Spelling kSpellings[] = {
     {"ReferenceProperty", &FbxReferenceDT},
 };
 
+/// The first row of that type string; -1 when there is none.
+int firstOfType(std::string_view typeName) {
+    static const NameIndex index(std::span<const PropertyTypeInfo>(kTypes),
+                                 [](const PropertyTypeInfo& row) { return row.typeName; });
+    return index.find(NameKey(typeName));
+}
+
 } // namespace
 
 FbxDataType dataTypeOf(std::string_view typeName, std::string_view subTypeName) {
-    const PropertyTypeInfo* sameType = nullptr;
-    for (const PropertyTypeInfo& row : kTypes) {
-        if (typeName != row.typeName)
-            continue;
-        if (subTypeName == row.subTypeName)
-            return FbxDataType(&row);
-        if (!sameType)
-            sameType = &row;
+    const int first = firstOfType(typeName);
+    if (first >= 0) {
+        for (const PropertyTypeInfo& row : std::span(kTypes).subspan(static_cast<std::size_t>(first))) {
+            if (typeName == row.typeName && subTypeName == row.subTypeName)
+                return FbxDataType(&row);
+        }
+        return FbxDataType(&kTypes[first]);
     }
-    if (sameType)
-        return FbxDataType(sameType);
     for (const Spelling& spelling : kSpellings) {
         if (typeName == spelling.typeName)
             return *spelling.type;
@@ -137,11 +142,8 @@ FbxDataType dataTypeOf(std::string_view typeName, std::string_view subTypeName) 
 }
 
 std::string_view subTypeOf(std::string_view typeName) {
-    for (const PropertyTypeInfo& row : kTypes) {
-        if (typeName == row.typeName)
-            return row.subTypeName;
-    }
-    return {};
+    const int first = firstOfType(typeName);
+    return first >= 0 ? kTypes[first].subTypeName : std::string_view();
 }
 
 std::size_t componentCount(EFbxType type) {

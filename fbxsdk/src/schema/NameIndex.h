@@ -1,35 +1,83 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The rows of a class by name: files name a class's properties again with each of its objects.
+// The rows of a table by name: files repeat the names of properties and types with each object.
 #pragma once
 
+#include <algorithm>
 #include <array>
+#include <cstddef>
 #include <cstdint>
 #include <span>
 #include <string_view>
+#include <vector>
 
-#include "schema/PropertyRow.h"
+#include <fbxsdk/FbxArch.h>
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+/// A name, and what a look-up compares first: its length and both ends. Of a literal the compiler works them out.
+class NameKey {
+public:
+    explicit constexpr NameKey(std::string_view name)
+        : text(name), first(word(name.substr(0, kEnd))),
+          last(word(name.substr(name.size() > kEnd ? name.size() - kEnd : 0))) {}
+    template <std::size_t size>
+    consteval NameKey(const char (&literal)[size]) : NameKey(std::string_view(literal, size - 1)) {}
+
+    [[nodiscard]] bool matches(const NameKey& other) const {
+        return first == other.first && last == other.last && text.size() == other.text.size() &&
+               (text.size() <= 2 * kEnd || text == other.text);
+    }
+    [[nodiscard]] std::size_t hash() const {
+        constexpr std::uint64_t kFactor = 0x9E3779B97F4A7C15;
+        return static_cast<std::size_t>(((first * kFactor ^ last) * kFactor + text.size() * kFactor) >> 32U);
+    }
+
+    std::string_view text;
+
+private:
+    static constexpr std::size_t kEnd = sizeof(std::uint64_t);
+
+    /// Up to eight characters, the first one lowest.
+    static constexpr std::uint64_t word(std::string_view end) {
+        std::uint64_t bits = 0;
+        if (end.size() == kEnd) { // of a fixed length: a single load
+            for (std::size_t i = 0; i < kEnd; ++i)
+                bits |= std::uint64_t{static_cast<unsigned char>(end[i])} << 8 * i;
+            return bits;
+        }
+        for (std::size_t i = 0; i < end.size(); ++i)
+            bits |= std::uint64_t{static_cast<unsigned char>(end[i])} << 8 * i;
+        return bits;
+    }
+
+    std::uint64_t first, last;
+};
+
 /// A hash table in place. Rows beyond `kMostRows` are not in it.
-class RowIndex {
+class NameIndex {
 public:
     static constexpr std::size_t kMostRows = 192;
 
-    explicit RowIndex(std::span<const PropertyRow> rows);
+    template <class Row, class NameOf>
+    NameIndex(std::span<const Row> rows, const NameOf& nameOf) {
+        mNames.reserve(std::min(rows.size(), kMostRows));
+        for (const Row& row : rows.first(std::min(rows.size(), kMostRows)))
+            add(NameKey(std::string_view(nameOf(row))));
+    }
 
     /// -1 when there is none. Of several rows of one name the first.
-    [[nodiscard]] int find(std::string_view name) const;
+    [[nodiscard]] int find(const NameKey& name) const;
 
 private:
     static constexpr std::size_t kSlots = 512;
 
-    std::span<const PropertyRow> mRows;
+    void add(const NameKey& name);
+
     std::array<std::uint8_t, kSlots> mSlots{}; ///< 0: free; else 1 more than the row
-    std::array<std::uint8_t, kMostRows> mLengths{};
+    std::vector<NameKey> mNames;               ///< of the rows
 };
 
 } // namespace detail

@@ -18,9 +18,11 @@
 #include <fbxsdk/FbxTexture.h>
 
 #include "io/SceneReading.h"
+#include "object/ManagerData.h"
 #include "platform/document/DocumentFromText.h"
 #include "platform/scene/Animate.h"
 #include "platform/scene/SceneFixture.h"
+#include "schema/Schema.h"
 
 namespace {
 
@@ -70,6 +72,53 @@ AnimationLayer: 901, "AnimLayer::base", "" { }
 )";
 
 // What files state.
+
+constexpr const char* kTwoProperties = R"(P: "Lcl Translation", "Lcl Translation", "", "A",1,2,3
+        P: "gain", "double", "Number", "U",0.5
+)";
+
+TEST_F(SceneReadingTest, ReadsPropertiesAtTheFirstQuestionWhicheverItIs) {
+    read(model(1, "a", kTwoProperties) + model(2, "b", kTwoProperties) + model(3, "c", kTwoProperties) +
+             model(4, "d", kTwoProperties) + model(5, "e", kTwoProperties),
+         "C: \"OO\",1,0\nC: \"OO\",2,0\nC: \"OO\",3,0\nC: \"OO\",4,0\nC: \"OO\",5,0");
+    ASSERT_EQ(scene->GetRootNode()->GetChildCount(), 5);
+
+    EXPECT_EQ(child(0)->LclTranslation.Get(), FbxDouble3(1, 2, 3));
+    EXPECT_EQ(child(1)->FindProperty("gain").Get<FbxDouble>(), 0.5);
+    EXPECT_EQ(child(2)->FindProperty("GAIN", false).Get<FbxDouble>(), 0.5);
+    EXPECT_EQ(child(3)->data().propertyCount(), static_cast<int>(detail::kNodeRows.size()) + 1);
+
+    child(4)->LclScaling.Set(FbxDouble3(2, 2, 2));
+    EXPECT_EQ(child(4)->LclTranslation.Get(), FbxDouble3(1, 2, 3));
+    EXPECT_EQ(child(4)->LclScaling.Get(), FbxDouble3(2, 2, 2));
+}
+
+TEST_F(SceneReadingTest, AQuestionThatReadsPropertiesChangesNothing) {
+    read(model(1, "a", kTwoProperties), "C: \"OO\",1,0");
+    const std::uint64_t before = manager->data().revision;
+
+    EXPECT_EQ(child()->LclTranslation.Get(), FbxDouble3(1, 2, 3));
+    EXPECT_EQ(manager->data().revision, before);
+}
+
+TEST_F(SceneReadingTest, ANewPropertyStandsBehindThoseOfTheFile) {
+    read(model(1, "a", kTwoProperties), "C: \"OO\",1,0");
+
+    const FbxProperty made = FbxProperty::Create(child(), FbxIntDT, "made");
+    EXPECT_EQ(made.index(), static_cast<int>(detail::kNodeRows.size()) + 1);
+    EXPECT_EQ(child()->FindProperty("gain").index(), made.index() - 1);
+    EXPECT_FALSE(FbxProperty::Create(child(), FbxDoubleDT, "gain").index() > made.index());
+}
+
+TEST_F(SceneReadingTest, AnObjectThatLeftItsSceneKeepsItsProperties) {
+    read(model(1, "a", kTwoProperties), "C: \"OO\",1,0");
+    FbxNode* node = child();
+    scene->GetRootNode()->RemoveChild(node);
+    scene->DisconnectSrcObject(node);
+    scene->Destroy();
+
+    EXPECT_EQ(node->LclTranslation.Get(), FbxDouble3(1, 2, 3));
+}
 
 TEST_F(SceneReadingTest, HangsNodesInTheOrderOfTheirConnections) {
     read(model(1, "a") + model(2, "b") + model(3, "c"), "C: \"OO\",3,0\nC: \"OO\",1,0\nC: \"OO\",2,1");

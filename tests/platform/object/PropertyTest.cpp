@@ -100,14 +100,14 @@ TEST_F(FbxPropertyTest, AssigningATypedPropertyCopiesTheValue) {
 }
 
 TEST_F(FbxPropertyTest, CostsNothingUntilItIsChanged) {
-    EXPECT_TRUE(node->data().properties.empty());
+    EXPECT_TRUE(node->data().properties().empty());
 
     EXPECT_EQ(node->LclScaling.Get(), FbxDouble3(1, 1, 1));
     EXPECT_TRUE(node->LclScaling.GetFlag(FbxPropertyFlags::eAnimatable));
-    EXPECT_TRUE(node->data().properties.empty());
+    EXPECT_TRUE(node->data().properties().empty());
 
     node->LclScaling.Set(FbxDouble3(2, 2, 2));
-    EXPECT_EQ(node->data().properties.size(), 1U);
+    EXPECT_EQ(node->data().properties().size(), 1U);
 }
 
 TEST_F(FbxPropertyTest, KeepsValuesApartHoweverManyAreChanged) {

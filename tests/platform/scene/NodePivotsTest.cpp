@@ -54,7 +54,7 @@ TEST_F(NodePivotsTest, StartsFromTheDefaultsOfFiles) {
         EXPECT_EQ(each.get(*node, FbxNode::eSourcePivot), expected) << each.property;
         EXPECT_EQ(each.get(*node, FbxNode::eDestinationPivot), expected) << each.property;
     }
-    EXPECT_TRUE(node->data().properties.empty());
+    EXPECT_TRUE(node->data().properties().empty());
 }
 
 TEST_F(NodePivotsTest, WritesTheSourceSetToItsPropertiesAndIgnoresW) {
@@ -83,7 +83,7 @@ TEST_F(NodePivotsTest, KeepsTheDestinationSetApart) {
         EXPECT_EQ(each.get(*node, FbxNode::eDestinationPivot), FbxVector4(7, 8, 9, 1));
         EXPECT_EQ(each.get(*node, FbxNode::eSourcePivot), FbxVector4(each.initial, each.initial, each.initial, 1));
     }
-    EXPECT_TRUE(node->data().properties.empty());
+    EXPECT_TRUE(node->data().properties().empty());
 }
 
 TEST_F(NodePivotsTest, KeepsReferencesToDifferentVectorsApart) {

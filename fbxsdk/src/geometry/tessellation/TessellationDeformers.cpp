@@ -212,7 +212,7 @@ void destroyDeformers(FbxGeometry& geometry) {
 }
 
 void carryProperties(FbxObject& to, const FbxObject& from) {
-    for (const std::unique_ptr<PropertyData>& source : from.data().properties) {
+    for (const PropertyData* source : from.data().properties()) {
         const FbxProperty named(const_cast<FbxObject*>(&from), source->index);
         const std::string name = named.GetNameAsCStr();
         FbxProperty property = to.FindProperty(name.c_str());
