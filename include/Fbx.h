@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a host calls: each operation opens one FBX file, takes from it what was asked for and closes it
-// again, or writes one.
+// The facade: each operation opens one FBX file, reads the requested data and closes it
+// again, or writes one file.
 #pragma once
 
 #include "TnFbxCamera.h"
@@ -23,27 +23,27 @@
 /// The library: value classes, the facade and the adapters.
 namespace Tarnell::Fbx {
 
-class FbxSdk; // its header brings the platform's along, which few hosts need
+class FbxSdk; // FbxSdk.h includes the platform's headers, which few hosts need
 
 /// The facade. It has no state: any number of threads may call any number of facades.
 ///
-/// Where a bool is returned, false is a failure, and `lastError()` says why. Where there is not enough memory, either
-/// that happens or std::bad_alloc is thrown, and nothing else ever is. A file that is changed while it is read is a
-/// failure, too, unless what was read until then is all that was asked for.
+/// Where a bool is returned, false is a failure, and `lastError()` says why. When memory runs out, either that
+/// happens or std::bad_alloc is thrown; no other exception is thrown. A file that is changed while it is read is a
+/// failure as well, unless all of the requested data had been read by then.
 class TARNELL_FBX_API Fbx {
 public:
-    /// Costs nothing and opens nothing.
+    /// Trivial; opens no file.
     Fbx();
     ~Fbx();
     Fbx(const Fbx& other) = default;
-    /// Copies nothing: there is no state.
+    /// Trivial: the facade has no state.
     Fbx& operator=(const Fbx& other);
 
-    /// Loads a file into a context of the caller's, with NURBS and patches turned into meshes. After a failure the
-    /// context is not initialised any more.
+    /// Loads a file into the caller's context and converts NURBS and patches to meshes. After a failure the
+    /// context is no longer initialised.
     bool loadScene(const std::string& fileName, FbxSdk& sdk) const;
 
-    /// How many objects a read yields: `count`, the number of candidates, when all are asked for; otherwise 1 when a
+    /// How many objects a read yields: `count`, the number of candidates, when all are requested; otherwise 1 when a
     /// node of the kind has exactly the name, else 0. A negative count gives 0.
     int getNumberOfObjects(int count, bool allObjects, int nodeTypeMask, const std::string& objectName,
                            FbxSdk& sdk) const;
@@ -54,7 +54,7 @@ public:
                                     std::vector<std::string>& nodeNames) const;
 
     /// The time between the first and the last key of the file, in seconds although the name says frames. False also
-    /// when nothing in it is animated.
+    /// when nothing in the file is animated.
     bool getAnimationFrameRange(const char* fileName, float& start, float& end) const;
 
     /// Reads every object of the kind in the file, or the one named by `info.getObjectName()`.
@@ -83,26 +83,26 @@ public:
     /// the read is faithful.
     bool getTransforms(TnFbxReadInfo& info, TnFbxTransform** objects, int& count) const;
 
-    /// Writes one file, and beside it the point caches of animated meshes. The objects are only read; null pointers are
-    /// left out, and so are kinds that `info` does not ask for. There are no markers: they are read but never written.
-    /// False when `info` names no file or no animation stack, and when the file cannot be written. Curves go into the
-    /// stack "Take 001", whatever the name. With `kFbxFidelityFaithful` in `info` they go into the stack of the name,
-    /// which may be empty, and what is written comes back: docs/faithful.md.
-    /// The file and its caches appear together, or what stood there before stays. A mesh whose cache cannot be written
-    /// is written without it; `lastWarnings()` says so, and what else the file lacks or no program will understand.
+    /// Writes one file, and next to it the point caches of animated meshes. The objects are only read; null pointers
+    /// are skipped, and so are kinds that `info` does not select. Markers are read but never written. False when `info`
+    /// names no file or no animation stack, and when the file cannot be written. Curves go into the stack "Take 001",
+    /// whatever the name. With `kFbxFidelityFaithful` in `info` they go into the stack of the name, which may be empty,
+    /// and a read returns what was written: docs/faithful.md. The file and its caches appear together, or the previous
+    /// files stay. A mesh whose cache cannot be written is written without it; `lastWarnings()` reports that, and
+    /// whatever else the file lacks or no program can interpret.
     bool writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
                    const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                    const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const;
 };
 
-/// On how many threads the calls of the process may work at most: 1 at first, the caller's own, or what
-/// TARNELL_FBX_THREADS in the environment says.
+/// How many threads the calls of the process may use at most: initially 1, the caller's own, or the value of
+/// TARNELL_FBX_THREADS in the environment.
 TARNELL_FBX_API int maximumThreads();
 
-/// 0 is as many threads as the machine has; less counts as 1. The arrays of a large mesh are then deflated on several
-/// threads, which start and end within the call that they work for; calls at the same time share them. Reading takes
-/// the caller's thread alone. What is written is the same for every number. Any thread may call this at any time; a
-/// call that has begun may still work as it began.
+/// 0 means as many threads as the machine has; less counts as 1. The arrays of a large mesh are then deflated on
+/// several threads, which start and end within the call that uses them; concurrent calls share them. Reading uses the
+/// caller's thread alone. What is written is the same for every number. Any thread may call this at any time; a call in
+/// progress may keep the previous number.
 TARNELL_FBX_API void setMaximumThreads(int count);
 
 } // namespace Tarnell::Fbx

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A file that is read faithfully and stays loaded, for who reads several kinds of objects or many frames.
-// Hosts that do not can call `Fbx`, which loads the file for every call.
+// A file that is read faithfully and stays loaded, for hosts that read several kinds of objects or many frames.
+// Other hosts can call `Fbx`, which loads the file for every call.
 #pragma once
 
 #include "FbxPlatform.h"
@@ -19,21 +19,21 @@
 
 namespace Tarnell::Fbx {
 
-/// One file, loaded once, in centimetres, Y up. The values are those of docs/faithful.md, whatever the fidelity in the
-/// options.
+/// One file, loaded once, in centimetres, Y up. The values are those of docs/faithful.md, regardless of the fidelity in
+/// the options.
 ///
-/// It belongs to one thread, whose time mode is the file's for as long as it lives. False is a failure, and
-/// `lastError()` says why; each operation is a call of its own as far as `lastWarnings()` goes.
+/// An object belongs to one thread, whose time mode is the file's as long as the object exists. False is a failure, and
+/// `lastError()` says why; for `lastWarnings()` each operation counts as a call of its own.
 class TARNELL_FBX_API FbxFaithful {
 public:
-    /// No file yet.
+    /// No file is loaded yet.
     FbxFaithful();
     ~FbxFaithful();
     FbxFaithful(const FbxFaithful&) = delete;
     FbxFaithful& operator=(const FbxFaithful&) = delete;
 
-    /// Loads the file that the options name, and selects the stack and the frames; what they say of spaces and points
-    /// holds for all reads. To be called once.
+    /// Loads the file that the options name, and selects the stack and the frames; the options for spaces and points
+    /// apply to all reads. To be called once.
     bool load(const TnFbxReadInfo& info);
 
     /// The scene of the file, null before one is loaded. It and its objects belong to this object, and the host must
@@ -48,19 +48,19 @@ public:
     /// infinite.
     bool setFrame(float frame);
 
-    /// Replaces NURBS and patches by meshes. A read of all meshes does so by itself.
+    /// Converts NURBS and patches to meshes. A read of all meshes does so by itself.
     bool makeMeshes();
 
     /// All objects of a kind, or the first of the name in the options, in an array that the caller owns; null for none.
-    /// After a failure there may be one as well. Each call may hand out as much as `memoryLimit()` says.
+    /// After a failure there may be one as well. Each call may return as much as `memoryLimit()` allows.
     template <class Object>
     bool readAll(Object** objects, int& count);
 
-    /// One node of the kind into a new object. All of them together may take as much as `memoryLimit()` says.
+    /// One node of the kind into a new object. All of them together may take as much as `memoryLimit()` allows.
     template <class Object>
     bool read(fbxsdk::FbxNode& node, Object& object);
 
-    /// Adds the points of the node's mesh at the frame to a mesh that was read from it: one more set.
+    /// Adds the points of the node's mesh at the frame to a mesh that was read from that node, as one more set.
     bool readPoints(fbxsdk::FbxNode& node, TnFbxMesh& mesh);
 
 private:
@@ -68,7 +68,7 @@ private:
     std::unique_ptr<File> mFile;
 };
 
-/// The instances of the templates for one class, which are in the library.
+/// Instances of the templates for one class; they are in the library.
 #define TARNELL_FBX_FAITHFUL(Object)                                                                                   \
     extern template TARNELL_FBX_API bool FbxFaithful::readAll(Object**, int&);                                         \
     extern template TARNELL_FBX_API bool FbxFaithful::read(fbxsdk::FbxNode&, Object&);

@@ -8,5 +8,5 @@
 #if __has_include(<fbxsdk/Platform.h>)
 #include <fbxsdk/Platform.h>
 #else
-#include <fbxsdk.h> // an external SDK that the host finds by itself
+#include <fbxsdk.h> // an external SDK on the host's own include path
 #endif

@@ -1,9 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The adapter between the value classes and the FBX platform: one manager with one scene, loaded, walked and read, or
-// built and saved.
-// Hosts reach it through `Fbx`, which makes one for every call.
+// The adapter between the value classes and the FBX platform: one manager with one scene, loaded, traversed and read,
+// or built and saved. Hosts normally use it through `Fbx`, which creates one for every call.
 #pragma once
 
 #include "FbxPlatform.h"
@@ -39,12 +38,12 @@ class SampleAccount;
 /// One scene, and what can be read from it or written into it.
 ///
 /// The order of calls is `initFbxSdkManager`, `loadScene` and any number of queries, or `createScene` and `saveScene`,
-/// then `destroyFbxSdkManager`; the destructor makes up for a missing last one. A context belongs to one thread at a
-/// time; contexts share nothing.
+/// then `destroyFbxSdkManager`; the destructor calls the last one where the caller did not. A context belongs to one
+/// thread at a time; contexts share nothing.
 ///
-/// An operation whose result is a success or a failure sets `lastError()`; one whose false is an answer (a walk that
-/// found nothing, a mesh without deformers) leaves it alone. Scene objects are passed as pointers of the platform and
-/// stay the scene's.
+/// An operation whose result is a success or a failure sets `lastError()`; one whose false is a valid result (a walk
+/// that found nothing, a mesh without deformers) leaves it unchanged. Scene objects are passed as pointers of the
+/// platform and stay owned by the scene.
 class TARNELL_FBX_API FbxSdk {
     friend class detail::ReadScope;
 
@@ -55,36 +54,37 @@ public:
 
     /// No manager and no scene.
     FbxSdk();
-    /// Destroys the manager and with it everything that was read.
+    /// Destroys the manager and with it everything that was read into the scene.
     ~FbxSdk();
 
     FbxSdk(const FbxSdk&) = delete;
 
-    /// Copies nothing: a context that is not initialised yet gets a manager and an empty scene of its own, and one that
-    /// is stays as it is.
+    /// Copies nothing: a context that is not initialised yet gets a manager and an empty scene of its own, and an
+    /// initialised one stays as it is.
     FbxSdk& operator=(const FbxSdk& other);
 
     // ---- Manager, scene and loading ----
 
-    /// A manager with one empty scene; true at once when there is one already. False when there is no manager to be
-    /// had.
+    /// A manager with one empty scene; true at once when there is one already. False when no manager can be
+    /// created.
     bool initFbxSdkManager();
 
     /// False when the context is not initialised.
     bool destroyFbxSdkManager();
 
-    /// A manager and a scene that belong to the caller; this context's own are not touched. When there is no manager to
-    /// be had, `*manager` is null, `*scene` as it was, and the result false.
+    /// A manager and a scene that belong to the caller; this context's own are not touched. When no manager can
+    /// be created, `*manager` is null, `*scene` unchanged, and the result false.
     bool initializeSdkObjects(fbxsdk::FbxManager** manager, fbxsdk::FbxScene** scene);
 
     /// Destroys the manager, if there is one, and sets the pointer to null; always true.
     bool destroySdkObjects(fbxsdk::FbxManager** manager);
 
-    /// Imports a file into a scene as it is. False when the file cannot be read; the scene may hold a part of it then.
+    /// Imports a file into a scene without conversion. False when the file cannot be read; the scene may hold a part of
+    /// it then.
     bool loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, const std::string& fileName);
 
     /// Imports a file into the context's scene, converts it to centimetres and to a right-handed system with Y up,
-    /// makes meshes of NURBS and patches if `convertGeometry` says so, and selects the first animation stack.
+    /// converts NURBS and patches to meshes if `convertGeometry` says so, and selects the first animation stack.
     /// A second file adds to the same scene. False when the context is not initialised or the file cannot be read; the
     /// scene may hold a part of it then.
     bool loadScene(const std::string& fileName, bool convertGeometry);
@@ -92,7 +92,7 @@ public:
     /// The context's scene, null when not initialised.
     fbxsdk::FbxScene* getScene() const;
 
-    /// Turns every NURBS and patch of the scene, or of the node and what is below it, into a mesh; always true.
+    /// Converts every NURBS and patch of the scene, or of the node and its descendants, to a mesh; always true.
     /// @{
     bool convertNurbsAndPatch(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene);
     bool convertNurbsAndPatchRecursive(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* node);
@@ -100,12 +100,12 @@ public:
 
     // ---- Animation stacks and time ----
 
-    /// Selects the scene's first animation stack and gives it a layer, making what is missing ("Take 001",
+    /// Selects the scene's first animation stack and gives it a layer; whichever is missing is created ("Take 001",
     /// "Default Layer").
     void initCreateAnimationStack();
 
-    /// Selects the animation stack of exactly that name, of which everything is read and evaluated from then on; false
-    /// when there is none, and the selection stays.
+    /// Selects the animation stack of exactly that name, which is used for all reading and evaluation from then on;
+    /// false when there is none, and the selection stays.
     bool setCurrentAnimationStack(const std::string& name);
 
     /// Replaces `names` by the names of all animation stacks, in the scene's order. False without a scene.
@@ -119,7 +119,7 @@ public:
     // ---- Counting and naming: `mask` selects kinds of nodes ----
     //
     // Meshes 4, cameras 32, lights 64, markers 1, nulls 0x4000, transforms 0x4005. The root node is never counted,
-    // named or read. Whatever asks for cameras makes the seven producer cameras of a scene that has none.
+    // named or read. Functions that look for cameras create the seven producer cameras of a scene that has none.
 
     /// How many nodes below the root the mask selects; 0 without a context or scene.
     int getNumberOfNodeTypes(int mask) const;
@@ -146,20 +146,20 @@ public:
     /// the largest float and `end` its negative.
     bool getAnimationFrameRange(float& start, float& end);
 
-    /// Widens `start` and `end` (seconds) by the Maya point caches at and below a node; whether there were any.
+    /// Widens `start` and `end` (seconds) by the Maya point caches at and below a node; returns whether there were any.
     bool getAnimationFrameRangeRecursive(fbxsdk::FbxNode* node, float& start, float& end);
 
     // ---- Reading all objects of a kind ----
 
-    /// Fills an array of `count` objects, parents before their children, or only its first element when `info` asks for
+    /// Fills an array of `count` objects, parents before their children, or only its first element when `info` selects
     /// a single name. Producer cameras come first.
     ///
     /// False for a null array, a count below 1, without a context or scene, and when there are more objects than
     /// elements; what was filled until then stays. Elements without an object stay as they are.
     ///
     /// Animated channels get one sample for every whole frame; where all are equal they take the memory of one. False
-    /// also when the samples of a list would take more than `memoryLimit()`: `lastError()` says over which frames they
-    /// were asked for and how much they would have needed. Channels that got none are not animated then.
+    /// also when the samples of a list would take more than `memoryLimit()`: `lastError()` then states the frames and
+    /// the memory that they would have needed. Channels left without samples are not animated then.
     /// @{
     bool getMeshes(TnFbxReadInfo& info, TnFbxMesh* meshes, int count);
     bool getCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int count);
@@ -169,8 +169,8 @@ public:
     bool getTransforms(TnFbxReadInfo& info, TnFbxTransform* transforms, int count);
     /// @}
 
-    /// Reads a node and what is below it, as the function without "Recursive" reads the scene. `index` is the next free
-    /// element of the array and `count` its length; `found` says that the single object was read and ends the walk.
+    /// Reads a node and its descendants, as the function without "Recursive" reads the scene. `index` is the next free
+    /// element of the array and `count` its length; `found` reports that the single object was read and ends the walk.
     /// @{
     bool getMeshesRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS, bool allObjects,
                             bool transformPoints, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
@@ -192,9 +192,9 @@ public:
                                 TnFbxTransform* transforms, int count, bool& found);
     /// @}
 
-    /// One producer camera into the array: the element at `index`, which moves on, or, for a read by name, the first
-    /// element if the names are equal. `index` is not compared with the array's length. False when the camera, its node
-    /// or the array is null.
+    /// Reads one producer camera into the array: into the element at `index`, which is advanced, or, for a read by
+    /// name, into the first element if the names are equal. `index` is not compared with the array's length. False when
+    /// the camera, its node or the array is null.
     bool getProducerCamera(fbxsdk::FbxCamera* camera, TnFbxReadInfo& info, TnFbxCamera* cameras, const char* name,
                            int& index);
 
@@ -202,10 +202,10 @@ public:
 
     /// Reads one node into an object.
     ///
-    /// `time` is the range to sample, `global` asks for transforms in the world, and with `useSampleFPS` the key frames
+    /// `time` is the range to sample, `global` selects transforms in the world, and with `useSampleFPS` the key frames
     /// are converted to `sampleFPS`. `geometric` is the node's geometric transform. False for a null node, for one
     /// without the attribute that the object is read from, and when its samples would take more than `memoryLimit()`;
-    /// the object keeps what was set before. Channels that the scene says nothing about keep what they held.
+    /// the object then keeps what was set before. Channels that the scene does not define keep their values.
     /// @{
     bool getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                       TnFbxTransform& transform, fbxsdk::FbxAMatrix& geometric);
@@ -219,8 +219,8 @@ public:
                  TnFbxNull& null, fbxsdk::FbxAMatrix& geometric);
 
     /// As `getTransform`. The camera's own placement is always local; `global` concerns its target. With
-    /// `useInterestPosition` a camera without a target looks at its interest position. A camera that looks at something
-    /// gets its rotation from that.
+    /// `useInterestPosition` a camera without a target looks at its interest position. The rotation of a camera with a
+    /// target or an interest position follows from it.
     bool getCamera(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, bool useInterestPosition,
                    fbxsdk::FbxNode* node, TnFbxCamera& camera, fbxsdk::FbxAMatrix& geometric);
 
@@ -239,7 +239,7 @@ public:
     // ---- Transforms ----
 
     /// Position, rotation (degrees) and scale in the world, one value per frame of `time`. Lights that shine along an
-    /// axis are turned by −90° about X.
+    /// axis are rotated by −90° about X.
     /// False, with empty vectors, when the range is empty, the node null, or the values would take more than
     /// `memoryLimit()`.
     bool getGlobalPositionRotationScaleValues(TnFbxTime& time, fbxsdk::FbxNode* node, fbxsdk::FbxAMatrix& geometric,
@@ -256,7 +256,7 @@ public:
     bool setTransformValues(fbxsdk::FbxNode* node, TnFbxTime& time, bool useSampleFPS, float sampleFPS,
                             TnFbxTransform* transform);
 
-    /// Converts between the rotation orders of FBX and of the library; what is out of range gives ZXY.
+    /// Converts between the rotation orders of FBX and of the library; a number out of range gives ZXY.
     /// @{
     TnFbxTransform::EFbxTransformRotationOrder getRotationOrderConstant(fbxsdk::FbxEuler::EOrder order);
     fbxsdk::FbxEuler::EOrder getRotationOrderConstant(TnFbxTransform::EFbxTransformRotationOrder order);
@@ -278,20 +278,20 @@ public:
     /// Whether the mesh has an active vertex cache, a shape or a cluster.
     bool getDeformation(fbxsdk::FbxMesh* mesh);
 
-    /// Stores a new array with the deformed control points, in the mesh's own space, in `*points`, and releases the one
-    /// that was there; the caller owns the array and releases it with `delete[]`. Nothing changes when an argument is
-    /// null or the mesh has no points. `globalPosition` is the mesh's place in the world, for its skin.
+    /// Stores a new array with the deformed control points, in the mesh's own space, in `*points`, and releases the
+    /// previous one; the caller owns the array and releases it with `delete[]`. Nothing changes when an argument is
+    /// null or the mesh has no points. `globalPosition` is the mesh's global transform, for its skin.
     void getDeformedControlPoints(fbxsdk::FbxNode* node, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
                                   fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxVector4** points);
 
-    /// Overwrites the points, one per control point, by those of the mesh's vertex cache, whose file must be open. A
+    /// Overwrites the points, one per control point, with those of the mesh's vertex cache, whose file must be open. A
     /// cache that cannot be read leaves them as they are.
     void readVertexCacheData(fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time, fbxsdk::FbxVector4* points);
     /// Adds the blend shapes of the mesh to the points, one per control point.
     void computeShapeDeformation(fbxsdk::FbxNode* node, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
                                  fbxsdk::FbxVector4* points);
-    /// Deforms the points, one per control point, by the skins of the mesh. `globalPosition` is the mesh's place in the
-    /// world.
+    /// Deforms the points, one per control point, by the skins of the mesh. `globalPosition` is the mesh's global
+    /// transform.
     void computeClusterDeformation(fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
                                    fbxsdk::FbxVector4* points);
 
@@ -305,14 +305,14 @@ public:
 
     // ---- Building a scene ----
     //
-    // What is made here belongs to the manager and stays when a later step fails. Names go into the scene as they are.
+    // What is created here belongs to the manager and stays when a later step fails. Names go into the scene unchanged.
 
-    /// Global settings, animation stack and one node below the root per object, of the kinds that `info` asks for:
+    /// Global settings, animation stack and one node below the root per object, of the kinds that `info` selects:
     /// cameras, lights, transforms, nulls, meshes, each in the order of its list. Null pointers and meshes without
-    /// geometry are left out. Curves go into the stack "Take 001", whatever the name in `info`; its span is that of its
+    /// geometry are skipped. Curves go into the stack "Take 001", whatever the name in `info`; its span is that of its
     /// keys and of the frames of `info`, unless those are 1 to 1 as in new options. Point caches of animated meshes are
-    /// written at once, next to where the scene will be saved. What could not be written, and what no program will make
-    /// sense of, is in `lastWarnings()`. False when the context is not
+    /// written at once, next to where the scene will be saved. What could not be written, and what no program can
+    /// interpret, is in `lastWarnings()`. False when the context is not
     /// initialised. Throws std::runtime_error when a layer element has no direct array.
     bool createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
                      const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
@@ -329,10 +329,10 @@ public:
     bool setGlobalLightSettings(fbxsdk::FbxScene* scene);
     /// The camera switcher as default camera, and the producer cameras.
     bool setGlobalCameraSettings(fbxsdk::FbxScene* scene);
-    /// The time mode within 0.00001 of the rate, a custom one when there is none.
+    /// The time mode within 0.00001 of the rate, or a custom one when there is none.
     bool setGlobalTimeSettings(fbxsdk::FbxScene* scene, float framesPerSecond);
 
-    /// Creates a node with its attribute, unparented and owned by the manager; null when a pointer is.
+    /// Creates a node with its attribute, unparented and owned by the manager; null when an argument is a null pointer.
     /// @{
     fbxsdk::FbxNode* createCamera(fbxsdk::FbxScene* scene, const std::string& name);
     fbxsdk::FbxNode* createNull(fbxsdk::FbxManager* manager, const std::string& name);
@@ -344,7 +344,7 @@ public:
     /// polygons claim far more polygon vertices than there are.
     fbxsdk::FbxNode* createMesh(fbxsdk::FbxManager* manager, const TnFbxMesh* mesh, const std::string& name);
 
-    /// A texture mapped by the texture coordinates, as large as it is; null for a null scene.
+    /// A texture mapped by the texture coordinates, unscaled; null for a null scene.
     fbxsdk::FbxFileTexture* createTexture(fbxsdk::FbxScene* scene, const std::string& fileName);
     /// A grey material whose name is `name` followed by `index`; null for a null manager.
     fbxsdk::FbxSurfaceLambert* createLambertMaterial(fbxsdk::FbxManager* manager, const std::string& name, int index);
@@ -354,7 +354,7 @@ public:
     // Onto a node and its attribute: static values into the properties, samples as linear keys into the first layer of
     // the current stack. What was written before a failure stays.
 
-    /// The static value of a channel as the curve's default, as it is, and its samples, times `scale`, as keys at the
+    /// The static value of a channel as the curve's default, unscaled, and its samples, times `scale`, as keys at the
     /// channel's own rate. False for a null argument.
     bool setCurveValues(fbxsdk::FbxAnimCurve* curve, TnFbxChannel* channel, float scale) const;
 
@@ -371,27 +371,27 @@ public:
 
     // ---- Point caches and saving ----
 
-    /// A vertex cache on the node's mesh: "<node>.xml" or ".pc2" in the folder "<file>_fpc" beside the FBX file, which
-    /// is made. What cannot stand in the name of a file is escaped. False for a null argument, an empty file name, a
-    /// node without geometry, and when the folder cannot be made.
+    /// A vertex cache on the node's mesh: "<node>.xml" or ".pc2" in the folder "<file>_fpc" next to the FBX file, which
+    /// is created. Characters not allowed in file names are escaped. False for a null argument, an empty file name, a
+    /// node without geometry, and when the folder cannot be created.
     bool mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* meshNode, bool mayaFormat,
                               const std::string& fbxFileName);
 
     /// Writes the mesh's sets of points, one per frame of `time`, into the file of the node's vertex cache.
     /// False for a null argument, when there is not exactly one set per frame or no cache, and when the file cannot be
-    /// written; where it cannot be opened, standard output says so too.
+    /// written; when it cannot be opened, that is also printed to standard output.
     bool animateVertexCacheOnMesh(fbxsdk::FbxNode* meshNode, const TnFbxMesh* mesh, bool mayaFormat, bool useMcxFormat,
                                   const TnFbxTime& time);
 
-    /// From now on, point caches do not appear until the scene is saved, together with its file: all of them, or none
-    /// and what stood there before stays. Without this each has its name when `animateVertexCacheOnMesh` returns.
-    /// An external platform may give the names at once all the same.
+    /// From now on, point caches do not appear until the scene is saved, together with its file: all of them, or none,
+    /// and the previous files stay. Without this each appears when `animateVertexCacheOnMesh` returns.
+    /// An external platform may rename the files at once all the same.
     void letPointCachesAppearWithScene();
 
     /// Writes the context's scene into the file that `info` names, in its format and version.
     bool saveScene(const TnFbxWriteInfo& info);
 
-    /// With `embedMedia` the file is binary, whatever `asciiFormat` says. A version that is none means the newest.
+    /// With `embedMedia` the file is binary, whatever `asciiFormat` says. A number that is no version means the newest.
     bool saveScene(fbxsdk::FbxManager* manager, fbxsdk::FbxDocument* document, const std::string& fileName,
                    bool asciiFormat, TnFbxWriteInfo::eCompatibilityVersion version, bool embedMedia);
 
@@ -416,14 +416,14 @@ private:
     bool mInitialized = false;
     bool mCachesAppearWithScene = false;
     fbxsdk::FbxManager* mManager = nullptr; // owned
-    fbxsdk::FbxScene* mScene = nullptr;     // the manager's
+    fbxsdk::FbxScene* mScene = nullptr;     // owned by the manager
     fbxsdk::FbxAnimStack* mCurrentAnimStack = nullptr;
     std::string mFileName;                             // of the file that was loaded last; empty: none
     std::unique_ptr<detail::MemoryAccount> mMemory;    // of the call that is reading
-    std::unique_ptr<detail::SampleAccount> mSamples;   // the same, as far as samples go
-    std::unique_ptr<detail::ObjectWarnings> mWarnings; // of it
-    std::unique_ptr<detail::MeshInstances> mInstances; // that it handed out
-    std::unique_ptr<detail::GlobalSampler> mGlobals;   // of the subtree that is being walked; null: none
+    std::unique_ptr<detail::SampleAccount> mSamples;   // the part of it for samples
+    std::unique_ptr<detail::ObjectWarnings> mWarnings; // of that call
+    std::unique_ptr<detail::MeshInstances> mInstances; // returned by that call
+    std::unique_ptr<detail::GlobalSampler> mGlobals;   // of the subtree that is being traversed; null: none
     std::unique_ptr<detail::FrameTimes> mFrameTimes;
     bool mIsReading = false;
 };

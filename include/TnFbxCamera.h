@@ -18,7 +18,7 @@ namespace Tarnell::Fbx {
 class TARNELL_FBX_API TnFbxCamera : public TnFbxTransform {
 public:
     /// The channels. The look-at and the up point are positions in the space of the camera's own position, not
-    /// directions. A faithful read hands out a direction in the up channels.
+    /// directions. A faithful read stores a direction in the up channels.
     enum EFbxCameraChannelType : int {
         kFbxCameraLookAtPositionX, ///< X of the point that the camera looks at, scene units.
         kFbxCameraLookAtPositionY, ///< Y of the point that the camera looks at, scene units.
@@ -54,8 +54,8 @@ public:
         kFbxApertureFocalLength            ///< The focal length.
     };
 
-    /// The static value of the channel of that name in a new camera. The film of 24.576 by 18.672, unlike any that was
-    /// read, is in millimetres; a faithful write takes it so.
+    /// The static value of the channel of that name in a new camera. The film of 24.576 by 18.672, unlike any that is
+    /// read from a file, is in millimetres; a faithful write interprets it so.
     /// @{
     static constexpr float kDefaultCameraLookAtPositionX = 0.0f;
     static constexpr float kDefaultCameraLookAtPositionY = 0.0f;
@@ -125,7 +125,7 @@ public:
     EFbxCameraProjectionType getProjectionType() const; ///< Default perspective.
     EFbxCameraApertureMode getApertureMode() const;     ///< Default focal length.
 
-    /// Scales a vector to unit length in place; one whose length is zero or NaN stays as it is.
+    /// Scales a vector to unit length in place; one whose length is zero or NaN is unchanged.
     static void normalize(float& x, float& y, float& z);
 
     /// c = a × b.

@@ -14,8 +14,8 @@ namespace Tarnell::Fbx {
 
 /// A static value and a dense run of samples over a closed range of whole frames.
 ///
-/// There are no keys, tangents or curve types: sample k belongs to frame `startFrame + k`, and neighbours are joined by
-/// straight lines. The static value and the samples never change each other.
+/// There are no keys, tangents or curve types: sample k belongs to frame `startFrame + k`, and adjacent samples are
+/// joined by straight lines. The static value and the samples never change each other.
 ///
 /// Samples that are all equal, to the bit, take the memory of one.
 class TARNELL_FBX_API TnFbxChannel {
@@ -23,7 +23,7 @@ public:
     static constexpr float kDefaultChannelValue = 0.0f; ///< The static value of a new channel.
 
     /// The most samples that one `setValueAt` adds to those in memory, 2^25 (128 MiB): every whole frame that a float
-    /// tells from its neighbours lies within as many.
+    /// distinguishes from the adjacent ones lies within as many.
     static constexpr std::size_t kMostAddedSamples = std::size_t{1} << 25;
 
     /// Not animated, no samples, static value 0.
@@ -50,28 +50,28 @@ public:
 
     /// Sets the sample at one whole frame and makes the channel animated.
     ///
-    /// `frame` is truncated toward zero; what lies beyond the range of an int counts as the int nearest to it, and NaN
-    /// as the lowest int. A frame outside the range widens the range up to it, and the frames in between read 0, not
-    /// their neighbours and not the static value. Frame and rate of the time record are not touched.
-    /// False, and nothing changes, for a frame so far from the range, as NaN and infinity are from most, that more than
+    /// `frame` is truncated toward zero; a value beyond the range of an int counts as the nearest int, and NaN
+    /// as the lowest int. A frame outside the range widens the range up to it, and the frames in between read 0,
+    /// neither an adjacent sample nor the static value. Frame and rate of the time record are not touched. False, and
+    /// nothing changes, for a frame so far from the range, as NaN and infinity are from most, that more than
     /// `kMostAddedSamples` samples would be added to those in memory.
-    /// Cost: memory for the whole gap; when that is not to be had the standard exception passes through and the
-    /// channel is as before.
+    /// Cost: memory for the whole gap; when the allocation fails the standard exception passes through and the
+    /// channel is unchanged.
     bool setValueAt(float frame, float value);
 
     /// Replaces all samples: `values[k]` is the sample of frame `time.getStartFrame() + k`. The whole record is kept.
     ///
     /// False, and nothing changes, when the range is inverted, `values` is empty, the rate is zero or below, or there
-    /// are fewer values than frames. Values beyond the range are accepted and never read. Copied values take the memory
-    /// that the channel has; `moveAnimatedValues` takes over that of the vector, which is left as moved from unless the
-    /// result is false.
+    /// are fewer values than frames. Values beyond the range are accepted and never read. Copied values go into the
+    /// memory that the channel has; `moveAnimatedValues` takes over that of the vector, which is left moved-from unless
+    /// the result is false.
     /// @{
     bool setAnimatedValues(TnFbxTime time, const std::vector<float>& values);
     bool moveAnimatedValues(TnFbxTime time, std::vector<float>&& values);
     /// @}
 
-    /// The same with one value for every frame of the range. It takes the memory of one sample; what there was before
-    /// is released.
+    /// The same with one value for every frame of the range. It takes the memory of one sample; the memory of the
+    /// previous samples is released.
     bool setConstantValues(TnFbxTime time, float value);
 
     /// The value at a possibly fractional frame; the static value when there are no samples.
@@ -96,8 +96,8 @@ private:
 
     bool mAnimated;
     TnFbxTime mTime;
-    std::vector<float> mValues; // the samples, or the one that all of them are
-    std::size_t mCount;         // of the samples
+    std::vector<float> mValues; // the samples, or one that all of them are equal to
+    std::size_t mCount;         // number of samples
     float mValue;
 };
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How much one call may hand out.
+// How much memory the results of one call may take.
 #pragma once
 
 #include "TnFbxExport.h"
@@ -11,14 +11,14 @@
 namespace Tarnell::Fbx {
 
 /// The bytes that the objects of one call may take, samples and mesh arrays included, or the keys of a scene that is
-/// written; what loading a file takes is not counted. A call that would take more fails, and `lastError()` says how
+/// written; the memory for loading a file is not counted. A call that would take more fails, and `lastError()` says how
 /// much it would have been.
 ///
-/// One value for the whole process, which any thread may read and set at any time; a call that has begun keeps the one
-/// it began with. At first half of the machine's memory.
+/// One value for the whole process, which any thread may read and set at any time; a call in progress keeps the one
+/// it began with. The default is half of the machine's memory.
 TARNELL_FBX_API std::uint64_t memoryLimit();
 
-/// Sets what `memoryLimit()` says, in bytes; 0 restores the default.
+/// Sets the limit that `memoryLimit()` returns, in bytes; 0 restores the default.
 TARNELL_FBX_API void setMemoryLimit(std::uint64_t bytes);
 
 } // namespace Tarnell::Fbx

@@ -18,7 +18,7 @@ namespace detail {
 struct MarkerChannels;
 }
 
-/// A marker. Its channels are reached only through the members below; no channel object is handed out.
+/// A marker. Its channels are accessible only through the members below; no channel object is returned.
 class TARNELL_FBX_API TnFbxMarker : public TnFbxTransform {
 public:
     /// The channels: the components of the colour.

@@ -17,13 +17,13 @@ class MeshInstances;
 
 /// A polygon mesh.
 ///
-/// Polygons are runs of polygon vertices, one after the other; each polygon vertex names a control point and carries a
+/// Polygons are runs of polygon vertices, one after the other; each polygon vertex refers to a control point and has a
 /// normal, a texture coordinate and a colour of its own. Point j of set k is control point k × number of control
 /// points + j. Points are in centimetres where the mesh was read from a file.
 ///
-/// Copies and assigned meshes share their arrays, and so do instances of one mesh that a read hands out, as far as they
-/// are equal. The first change of a shared array makes a copy of it, which takes memory; what others have stays as it
-/// is. Meshes that share belong to different threads as freely as those that do not.
+/// Copies and assigned meshes share their arrays, and so do instances of one mesh that a read returns, as far as they
+/// are equal. The first change of a shared array copies it, which takes memory; the other meshes keep the original
+/// elements. Meshes that share arrays may be used by different threads like any others.
 class TARNELL_FBX_API TnFbxMesh : public TnFbxTransform {
 public:
     /// A component of a new control point (P), normal (N), texture coordinate (U, V) or colour.
@@ -58,7 +58,7 @@ public:
 
     /// Sizes all arrays for one set of control points: polygon sizes, point indices, points, normals and texture
     /// coordinates of 0, colours of opaque white. The flags stay false until they are set.
-    /// False when a number is below 1; the mesh is empty then, whatever it held before.
+    /// False when a number is below 1; the mesh is empty then, also if it was not before.
     bool allocateGeometryData(int numberOfPolygons, int numberOfControlPoints, int numberOfPolygonVertices);
 
     /// Appends one control point and changes neither count; always true.
@@ -68,7 +68,7 @@ public:
     bool addControlPointSet();
 
     /// Sets one element of an array; control points are counted through all sets. False when there is no such element;
-    /// nothing changes then. What is stored is not checked: a point index may name a point that does not exist.
+    /// nothing changes then. Values are not checked: a point index may refer to a point that does not exist.
     /// @{
     bool setPolygonVertexSize(int polygon, int size);
     bool setPointIndex(int polygonVertex, int controlPoint);
@@ -90,7 +90,7 @@ public:
     bool getColour(int polygonVertex, float& red, float& green, float& blue, float& alpha) const;
     /// @}
 
-    /// Says whether the array carries data; always true.
+    /// Sets whether the array carries data; always true.
     /// @{
     bool setValidNormals(bool valid);
     bool setValidUVs(bool valid);
@@ -103,9 +103,9 @@ public:
     bool getValidColours() const;
     /// @}
 
-    /// Says whether the points are multiplied by the mesh's transform already; always true.
+    /// Sets whether the points are already multiplied by the mesh's transform; always true.
     bool setPointsPlaced(bool placed);
-    /// True after a faithful read with `setTransformPoints(true)`: a faithful write takes the transform out of the
+    /// True after a faithful read with `setTransformPoints(true)`: a faithful write removes the transform from the
     /// points again. Default false.
     bool getPointsPlaced() const;
 

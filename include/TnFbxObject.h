@@ -10,7 +10,7 @@
 
 namespace Tarnell::Fbx {
 
-/// A named scene object. Nothing but its destruction is virtual.
+/// A named scene object. Only the destructor is virtual.
 class TARNELL_FBX_API TnFbxObject {
 public:
     /// An empty name.

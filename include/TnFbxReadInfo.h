@@ -30,7 +30,7 @@ public:
     bool deleteReadInfo();
     /// @}
 
-    /// Stores what it is given, without a check; always true. What the option means is said at its getter.
+    /// Stores its argument without a check; always true. The meaning of an option is described at its getter.
     /// @{
     bool setFileName(const std::string& fileName);
     bool setAnimationStackName(const std::string& animationStackName);
@@ -48,15 +48,15 @@ public:
 
     const std::string& getFileName() const; ///< FBX file to read. Default empty.
 
-    /// The animation stack to read. Spelt without the n: hosts call it so. Empty means none is chosen, and then a
+    /// The animation stack to read. Spelt without the n: hosts call it so. With an empty name a
     /// compatible read fails while a faithful one takes the first. A compatible read takes the first whatever the name.
     const std::string& getAimationStackName() const;
     bool haveAnimationStack() const; ///< Whether an animation stack name is set.
 
     bool getGlobalTransform() const; ///< Transforms are read in the world, not relative to their parents. Default true.
 
-    /// Mesh points are multiplied by their node's transform. Default true. A compatible read hands out the points of
-    /// skins in the world, where this would move them twice: switch it off for these.
+    /// Mesh points are multiplied by their node's transform. Default true. A compatible read returns the points of
+    /// skins in the world, where this would transform them twice: switch it off for these.
     bool getTransformPoints() const;
 
     bool getUseSampleFPS() const; ///< Sampled at `getSampleFPS` instead of the scene's own rate. Default false.
@@ -69,7 +69,7 @@ public:
     const std::string& getObjectName() const; ///< Name of the single object to read, compared exactly.
     int getObjectID() const;                  ///< Kept for the host; the library does not read it. Default −1.
 
-    EFbxFidelity getFidelity() const; ///< What the values stand for; see docs/faithful.md. Default compatible.
+    EFbxFidelity getFidelity() const; ///< Which behaviour a read follows; see docs/faithful.md. Default compatible.
 
 private:
     struct Options {

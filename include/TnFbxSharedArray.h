@@ -11,8 +11,8 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Copying takes no memory and never fails. Copies may be read, changed and destroyed in different threads; one and
-/// the same object belongs to one thread while it changes, as a vector does.
+/// Copying takes no memory and never fails. Copies may be read, changed and destroyed in different threads; a single
+/// object belongs to one thread while it changes, as a vector does.
 template <class Element>
 class SharedArray {
 public:
@@ -34,13 +34,13 @@ public:
     }
 
     std::size_t size() const noexcept { return mHeld != nullptr ? mHeld->elements.size() : 0; }
-    /// Null or not where there are none.
+    /// May be null when the array is empty.
     const Element* data() const noexcept { return mHeld != nullptr ? mHeld->elements.data() : nullptr; }
 
-    /// Whether another array holds the same elements.
+    /// Whether another array shares the elements.
     bool isShared() const noexcept { return mHeld != nullptr && !isOwn(); }
 
-    /// The elements, for changing them: this array's own from here on, a copy where others share them.
+    /// The elements, for changing them: owned by this array alone afterwards, a copy where others share them.
     std::vector<Element>& own() {
         if (mHeld == nullptr) {
             mHeld = new Held;
@@ -50,7 +50,7 @@ public:
         return mHeld->elements;
     }
 
-    /// Leaves no element. The memory is kept, unless others share it.
+    /// Removes all elements. The memory is kept, unless others share it.
     void clear() noexcept {
         if (isShared()) {
             *this = SharedArray();
@@ -67,7 +67,7 @@ private:
 
     explicit SharedArray(const std::vector<Element>& elements) : mHeld(new Held{{1}, elements}) {}
 
-    /// Acquires: who let go of the elements last has read them before they change.
+    /// Acquire: the last reader elsewhere is done with the elements before this array changes them.
     bool isOwn() const noexcept { return mHeld->holders.load(std::memory_order_acquire) == 1; }
 
     Held* mHeld = nullptr;

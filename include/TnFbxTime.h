@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The time record that travels with every animated channel and through every read and write: a current frame, a
+// The time record of every animated channel and of every read and write: a current frame, a
 // closed range of whole frames and the rate that turns them into seconds.
 #pragma once
 
@@ -10,8 +10,8 @@
 namespace Tarnell::Fbx {
 
 /// A frame, a frame range and a frame rate, passed by value.
-///
-/// The record keeps no invariant: the range may be inverted and the rate zero or negative; its users check what they
+/// No invariant holds: the range may be inverted and the rate zero or negative; code that uses a record checks what it
+/// needs.
 /// need.
 class TARNELL_FBX_API TnFbxTime {
 public:
@@ -30,7 +30,7 @@ public:
     bool deleteTime();
     /// @}
 
-    /// Stores what is given, without a check; always true. The frame and the rate change only together with the rest.
+    /// Stores its arguments without a check; always true. The frame and the rate change only together with the rest.
     /// @{
     bool setTime(float frame, int startFrame, int endFrame, float frameRate);
     bool setStartFrame(int startFrame);

@@ -79,7 +79,7 @@ public:
     /// Copies the channels and the orders; the target keeps its own name.
     TnFbxTransform& operator=(const TnFbxTransform& other);
 
-    /// The state of a new transform, except that the name stays; always true.
+    /// Restores the state of a new transform, except that the name stays; always true.
     bool initTransform();
 
     /// The same, but with every static value 0, those of the scale included; always true.

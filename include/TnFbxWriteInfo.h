@@ -42,7 +42,7 @@ public:
     bool deleteWriteInfo();
     /// @}
 
-    /// Stores what it is given, without a check; always true. What the option means is said at its getter.
+    /// Stores its argument without a check; always true. The meaning of an option is described at its getter.
     /// @{
     bool setFileName(const std::string& fileName);
     bool setAnimationStackName(const std::string& animationStackName);
@@ -65,7 +65,7 @@ public:
     const std::string& getFileName() const; ///< FBX file to write; point caches are named after it.
 
     /// The name of the animation stack in a faithful write; empty means "Take 001". A compatible write fails without a
-    /// name and calls the stack "Take 001" whatever the name.
+    /// name and names the stack "Take 001" in any case.
     const std::string& getAnimationStackName() const;
 
     bool getFileFormat() const; ///< True: ASCII; false: binary. Default true.
@@ -86,7 +86,7 @@ public:
 
     /// The first or last frame. A compatible write drops fractions; in a faithful one they belong to the span. Point
     /// caches have a sample for each frame, and the span of the file reaches from the first to the last, and beyond as
-    /// far as there are keys. Frames 1 to 1, the default, say nothing about the span. Channels are written over their
+    /// far as there are keys. Frames 1 to 1, the default, do not define the span. Channels are written over their
     /// own ranges in any case.
     /// @{
     float getStartFrame() const;
@@ -95,7 +95,7 @@ public:
 
     eCompatibilityVersion getCompatibilityVersion() const; ///< Default `kFbxVersion2016`.
 
-    EFbxFidelity getFidelity() const; ///< What the file says of the objects; see docs/faithful.md. Default compatible.
+    EFbxFidelity getFidelity() const; ///< Which behaviour a write follows; see docs/faithful.md. Default compatible.
 
     /// A faithful write turns cameras that have a look-at point and no rotation toward the point. Default true.
     bool getComputeCameraRotation() const;
@@ -120,7 +120,7 @@ private:
     };
 
     Options mOptions;
-    eCompatibilityVersion mCompatibilityVersion; // apart from the others: assignment skips it
+    eCompatibilityVersion mCompatibilityVersion; // separate from the others: assignment skips it
 };
 
 } // namespace Tarnell::Fbx

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The facade: every call is a context of its own, from its manager to the manager's end.
+// The facade: every call has a context of its own, from the creation to the destruction of its manager.
 #include "Fbx.h"
 
 #include "FbxSdk.h"
@@ -24,7 +24,7 @@ namespace NodeMask = detail::NodeMask;
 
 namespace {
 
-/// What the readers of two kinds of objects differ in.
+/// The differences between the readers of two kinds of objects.
 template <class Object>
 struct ReaderRow {
     int (FbxSdk::*candidateCount)() const;
@@ -63,7 +63,7 @@ bool read(const Fbx& fbx, TnFbxReadInfo& info, Object** objects, int& count) {
         return info.getFileName().empty() ? fail("the read options name no file")
                                           : faithful::readObjects(info, objects, count);
     }
-    if (!info.haveAnimationStack()) { // kept: the name is asked for, though the first stack is read in any case
+    if (!info.haveAnimationStack()) { // kept: the name is required, though the first stack is read in any case
         return fail("the read options name no animation stack");
     }
     if (info.getFileName().empty()) {
@@ -179,11 +179,11 @@ bool Fbx::writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>&
         return fail("the write options name no file");
     }
     const bool faithfully = info.getFidelity() == kFbxFidelityFaithful;
-    if (!faithfully && info.getAnimationStackName().empty()) { // kept: it is asked for, though the stack bears another
+    if (!faithfully && info.getAnimationStackName().empty()) { // kept: required, though the stack has another name
         return fail("the write options name no animation stack");
     }
     const auto place = detail::pointCachePlace(info.getFileName(), /*nodeName*/ "", /*extension*/ "");
-    detail::NewFolders folders(std::string(place.folder)); // goes after the context, which takes its files away
+    detail::NewFolders folders(std::string(place.folder)); // destroyed after the context, which removes its files
     if (faithfully) {
         const bool written = faithful::writeObjects(info, cameras, lights, transforms, nulls, meshes);
         if (written) {

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// On how many threads a call may work. Only the bundled platform can be told: with another one the number is kept and
-// of no effect.
+// The number of threads that a call may use. Only the bundled platform supports it: with another one the number is
+// stored without effect.
 #include "Fbx.h"
 
 #ifdef TARNELL_FBX_EXTERNAL_FBXSDK

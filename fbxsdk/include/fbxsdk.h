@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Everything the platform declares. Its namespace is opened to the includer unless FBXSDK_NAMESPACE_USING is 0.
+// Every public header of the platform. Their namespace is opened to the includer unless FBXSDK_NAMESPACE_USING is 0.
 #pragma once
 
 #include <fbxsdk/FbxAMatrix.h>

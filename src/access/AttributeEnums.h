@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the enumerations of lights, markers and nulls are called here.
+// The library's enumerators for those of lights, markers and nulls in FBX.
 #pragma once
 
 #include "TnFbxLight.h"
@@ -14,7 +14,7 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// A number of FBX and what it is called here. What a table does not hold has the value that stands beside it.
+/// A number of FBX and its enumerator here. For a number that is not in a table, the value next to the table is used.
 template <class Value>
 struct EnumRow {
     int fbx;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the platform had to repair of a mesh's polygons, for `lastWarnings()`.
+// What the platform repaired in a mesh's polygons, for `lastWarnings()`.
 #pragma once
 
 #include "ObjectWarnings.h"
@@ -12,7 +12,7 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Only the bundled platform counts them; what another one makes of such corners is handed out as it is.
+/// Only the bundled platform counts them; corners from another platform are returned unchanged.
 template <class Mesh>
 void noteRepairedCorners(const std::string& fileName, const fbxsdk::FbxNode& node, const Mesh& mesh,
                          ObjectWarnings& warnings) {

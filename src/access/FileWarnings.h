@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the platform had to repair, leave out or assume of a file, for `lastWarnings()`.
+// What the platform repaired, omitted or assumed of a file, for `lastWarnings()`.
 #pragma once
 
 #include "calls/LastError.h"
@@ -18,7 +18,7 @@ inline void warnAbout(const std::string& fileName, const std::string& sentence) 
     warn(named ? sentence : fileName + ": " + sentence);
 }
 
-/// Only the bundled platform keeps a list of what it repaired; the headers of another have none, and say nothing.
+/// Only the bundled platform has a list of its repairs; with another one there are no warnings of this kind.
 template <class HeaderInfo>
 void warnOfRepairs(const std::string& fileName, const HeaderInfo* header) {
     if constexpr (requires { header->mWarnings.begin(); }) {

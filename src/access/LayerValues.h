@@ -21,12 +21,12 @@ struct Colour {
     float red, green, blue, alpha;
 };
 
-/// The values of a layer element by index, as its reference mode has it. They are asked for one by one: values that
-/// still stand in a file need not be in memory all at once for that.
+/// The values of a layer element by index, according to its reference mode. They are read one by one, so that values in
+/// a file need not be in memory all at once.
 template <class Value>
 class ElementValues {
 public:
-    /// Nothing is found.
+    /// No values.
     ElementValues() = default;
 
     /// Throws std::runtime_error when the element has no direct array.
@@ -39,12 +39,12 @@ public:
             mDirect = &element.GetDirectArray();
             mIndex = &element.GetIndexArray();
             break;
-        default: // an index alone leads nowhere
+        default: // an index alone refers to nothing
             break;
         }
     }
 
-    /// Values that are numbered all the same where the element has indices only.
+    /// Values that are indices where the element has indices only.
     static ElementValues numbered(const fbxsdk::FbxLayerElementTemplate<Value>& element) {
         ElementValues values;
         values.mDirect = &element.GetDirectArray();
@@ -54,7 +54,7 @@ public:
         return values;
     }
 
-    /// The values themselves where no index stands before them and there are at least so many; else null.
+    /// The values themselves where they have no index and there are at least that many; else null.
     const fbxsdk::FbxLayerElementArrayTemplate<Value>* inOrder(int count) const {
         return mIndex == nullptr && mDirect != nullptr && mDirect->GetCount() >= count ? mDirect : nullptr;
     }

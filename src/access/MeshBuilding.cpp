@@ -13,8 +13,8 @@ namespace {
 
 using Element = fbxsdk::FbxLayerElement;
 
-/// How many polygon vertices the polygons may claim beyond those that there are. Each becomes a corner at point 0; the
-/// limit keeps a wrong size from making thousands of millions of them.
+/// How many polygon vertices the polygons may claim beyond the existing ones. Each becomes a corner at point 0; the
+/// limit prevents a wrong size from creating billions of them.
 constexpr std::int64_t kMostMissingCorners = 65536;
 
 double widen(float value) { return static_cast<double>(value); }
@@ -55,7 +55,7 @@ void setNormals(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer
     layer.SetNormals(normals);
 }
 
-/// One value per polygon vertex, and indices that count them.
+/// One value per polygon vertex, and consecutive indices.
 template <class MappedElement, class ValueAt>
 void fillIndexed(MappedElement& element, int count, ValueAt valueAt) {
     element.SetMappingMode(Element::eByPolygonVertex);
@@ -84,7 +84,7 @@ void setColours(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer
     layer.SetVertexColors(colours);
 }
 
-/// Polygons without corners are left out; the next one goes on where they stand.
+/// Polygons without corners are omitted; the next one continues at their position.
 void addPolygons(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
     target.ReservePolygonCount(mesh.getNumberOfPolygons());
     target.ReservePolygonVertexCount(mesh.getNumberOfPolygonVertices());

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A mesh of the scene out of one of the library: points, polygons, and one layer with what the polygon vertices carry.
+// Conversion of a mesh of the library to one of the scene: points, polygons, and one layer for the polygon vertices.
 #pragma once
 
 #include "TnFbxMesh.h"

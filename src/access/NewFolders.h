@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Folders that a write may make on its way.
+// Folders that a write may create.
 #pragma once
 
 #include <filesystem>
@@ -12,10 +12,10 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Takes the folders away again that were not there before, unless they are kept or hold something.
+/// Removes the new folders again, unless they are kept or not empty.
 class NewFolders {
 public:
-    /// Of that folder and those that it is in.
+    /// For that folder and its ancestors.
     explicit NewFolders(std::filesystem::path folder) {
         std::error_code failure;
         while (folder.has_relative_path() && !std::filesystem::exists(folder, failure) && !failure) {

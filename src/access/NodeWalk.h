@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The one walk over the node tree: parents before their children, children in order.
+// The traversal of the node tree: parents before their children, children in order.
 #pragma once
 
 #include <fbxsdk.h>
@@ -10,11 +10,11 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Calls `visit(node)` for a node and everything below it, until it returns false; whether it never did. Null is an
-/// empty tree.
+/// Calls `visit(node)` for a node and all its descendants, until it returns false; returns whether it never did. Null
+/// is an empty tree.
 ///
-/// The way back up is kept in a vector, not on the stack: a file can nest its nodes as deep as it likes. The child
-/// count is asked for again after every child.
+/// The ancestors are kept in a vector, not on the call stack: a file can nest its nodes to any depth. The child
+/// count is read again after every child.
 template <class Visit>
 bool walkNodes(fbxsdk::FbxNode* top, Visit&& visit) {
     struct Position {
@@ -42,7 +42,7 @@ bool walkNodes(fbxsdk::FbxNode* top, Visit&& visit) {
     return goOn;
 }
 
-/// The same for everything below a node, but not the node itself.
+/// The same for all descendants of a node, but not the node itself.
 template <class Visit>
 bool walkBelow(fbxsdk::FbxNode* top, Visit&& visit) {
     bool goOn = true;

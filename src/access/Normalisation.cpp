@@ -15,7 +15,7 @@ fbxsdk::FbxAxisSystem targetAxisSystem() {
     return System(System::eYAxis, System::eParityOdd, System::eRightHanded);
 }
 
-/// Only a platform of ours can tell.
+/// Only the bundled platform reports it.
 template <class Converter>
 int coarserSurfaces(const Converter& converter) {
     if constexpr (requires { converter.coarserSurfaces(); }) {
@@ -29,7 +29,7 @@ int coarserSurfaces(const Converter& converter) {
 
 void detail::convertToCentimetres(fbxsdk::FbxScene& scene) {
     const double difference = scene.GetGlobalSettings().GetSystemUnit().GetScaleFactor() - 1.0;
-    if (difference < 0.0 || difference > 0.0) { // a unit that is no number is left alone
+    if (difference < 0.0 || difference > 0.0) { // a unit that is not a number is left unchanged
         const fbxsdk::FbxSystemUnit centimetre(/*pScaleFactor*/ 1.0, /*pMultiplier*/ 1.0);
         centimetre.ConvertScene(&scene, fbxsdk::FbxSystemUnit::DefaultConversionOptions);
     }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What every scene becomes before it is read: centimetres, Y up, right-handed, and meshes in the place of surfaces.
+// The normalisation of every scene before it is read: centimetres, Y up, right-handed, and meshes instead of surfaces.
 #pragma once
 
 #include <fbxsdk.h>
@@ -11,13 +11,13 @@ namespace Tarnell::Fbx::detail {
 void convertToCentimetres(fbxsdk::FbxScene& scene);
 void convertToYUp(fbxsdk::FbxScene& scene);
 
-/// Puts meshes in the place of NURBS and patches, node by node.
+/// Replaces NURBS and patches by meshes, node by node.
 class Triangulation {
 public:
     explicit Triangulation(fbxsdk::FbxManager* manager) : mConverter(manager) {}
-    /// False when the node's surface cannot become a mesh and stays.
+    /// False when the node's surface cannot be converted and stays.
     bool visit(fbxsdk::FbxNode& node);
-    /// To be called in the end: warns of surfaces that became coarser than they ask for, where the platform can tell.
+    /// To be called at the end: warns of surfaces that were sampled too coarsely, where the platform reports them.
     void warnOfCoarser() const;
 
 private:

@@ -12,9 +12,9 @@ namespace Tarnell::Fbx::detail {
 /// Names the first object that has a fault and counts the others, so that the list stays short enough to be read.
 class ObjectWarnings {
 public:
-    /// `fault` says what is wrong and what comes of it.
+    /// `fault` states what is wrong and its consequence.
     void add(const std::string& object, const std::string& fault);
-    /// Hands one sentence per fault to `lastWarnings()`.
+    /// Adds one sentence per fault to `lastWarnings()`.
     void report() const;
     void forget() { mRows.clear(); }
 

@@ -13,7 +13,7 @@ namespace Tarnell::Fbx {
 namespace {
 
 constexpr char kHexDigits[] = "0123456789ABCDEF";
-/// Of 255 bytes that a name may have, less the longest extension and what other programs append.
+/// Of the 255 bytes of a file name, less the longest extension and what other programs append.
 constexpr std::size_t kMostBytes = 240;
 
 void appendEscaped(std::string& text, char letter) {
@@ -27,7 +27,7 @@ bool isHexDigit(char letter) {
     return (letter >= '0' && letter <= '9') || (letter >= 'A' && letter <= 'F') || (letter >= 'a' && letter <= 'f');
 }
 
-/// Of separators, wildcards, quotes and control bytes, which some system does not allow.
+/// Separators, wildcards, quotes and control bytes, which are not allowed on every system.
 bool isForbidden(char letter) {
     constexpr std::string_view kForbidden = "/\\:*?\"<>|\x7F";
     return static_cast<unsigned char>(letter) < 0x20 || kForbidden.find(letter) != std::string_view::npos;
@@ -37,12 +37,12 @@ bool looksEscaped(std::string_view text) {
     return text.size() >= 3 && text[0] == '%' && isHexDigit(text[1]) && isHexDigit(text[2]);
 }
 
-/// How many bytes the character takes with which the text begins; 0 when it is none.
+/// The length of the character at the front of the text in bytes; 0 when it is invalid.
 std::size_t characterLength(std::string_view text) {
     const auto byte = [&](std::size_t i) { return i < text.size() ? static_cast<unsigned char>(text[i]) : 0U; };
     const unsigned first = byte(0), second = byte(1);
     const std::size_t length = first < 0x80   ? 1
-                               : first < 0xC2 ? 0 // a byte that continues, or a needless second one
+                               : first < 0xC2 ? 0 // a continuation byte, or an overlong encoding
                                : first < 0xE0 ? 2
                                : first < 0xF0 ? 3
                                : first < 0xF5 ? 4
@@ -57,7 +57,7 @@ std::size_t characterLength(std::string_view text) {
     return needless || none ? 0 : length;
 }
 
-/// A device of that name stands in every folder of some systems, also with an extension.
+/// A device of that name exists in every folder of some systems, also with an extension.
 bool isReserved(const std::string& name) {
     constexpr std::array<std::string_view, 4> kNames = {"CON", "PRN", "AUX", "NUL"};
     constexpr std::array<std::string_view, 2> kNumbered = {"COM", "LPT"};
@@ -70,7 +70,7 @@ bool isReserved(const std::string& name) {
 }
 
 std::string escaped(std::string_view name) {
-    const std::size_t end = name.find_last_not_of(" .") + 1; // 0 when there is nothing else
+    const std::size_t end = name.find_last_not_of(" .") + 1; // 0 when nothing else is left
     std::string text;
     for (std::size_t i = 0; i < name.size();) {
         const std::size_t length = characterLength(name.substr(i));
@@ -98,7 +98,7 @@ std::string hashOf(std::string_view name) {
     return digits;
 }
 
-/// The beginning of the text, with whole characters and escapes.
+/// The beginning of the text, in whole characters and escapes.
 std::string beginning(const std::string& text, std::size_t mostBytes) {
     std::size_t end = 0;
     while (end < mostBytes) {

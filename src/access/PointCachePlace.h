@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Where point caches lie: each FBX file has a folder for them beside it.
+// The location of point caches: each FBX file has a folder for them next to it.
 #pragma once
 
 #include "PointCacheName.h"
@@ -16,7 +16,7 @@ namespace Tarnell::Fbx::detail {
 struct PointCachePlace {
     fbxsdk::FbxString folder;
     fbxsdk::FbxString file;
-    fbxsdk::FbxString relative; ///< the file as seen from the folder of the FBX file
+    fbxsdk::FbxString relative; ///< the file relative to the folder of the FBX file
 };
 
 inline PointCachePlace pointCachePlace(const std::string& fbxFileName, const char* nodeName,

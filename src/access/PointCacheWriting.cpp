@@ -16,14 +16,14 @@ namespace {
 
 using Cache = fbxsdk::FbxCache;
 
-/// The platform gives such a cache its name when the scene is saved.
+/// The platform renames such a cache when the scene is saved.
 void appearWithScene(Cache& cache) {
     fbxsdk::FbxProperty property = fbxsdk::FbxProperty::Create(&cache, fbxsdk::FbxBoolDT, "AppearWithScene");
     property.ModifyFlag(fbxsdk::FbxPropertyFlags::eNotSavable, true);
     property.Set(true);
 }
 
-/// The control points from `first` on, as many as the buffer has room for; points that there are not lie at the
+/// The control points from `first` on, as many as the buffer holds; missing points are at the
 /// origin.
 void copyPoints(const TnFbxMesh& mesh, int first, std::vector<double>& buffer) {
     for (std::size_t i = 0; i < buffer.size(); i += 3) {

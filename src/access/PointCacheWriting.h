@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Moving points of a mesh as a point cache: the deformer that names the file, and the file with a sample per frame.
+// Animated points of a mesh as a point cache: the deformer that names the file, and the file with a sample per frame.
 #pragma once
 
 #include "PointCachePlace.h"
@@ -24,19 +24,19 @@ struct PointCacheForm {
 fbxsdk::FbxVertexCacheDeformer* pointCacheDeformerOf(fbxsdk::FbxNode& node);
 fbxsdk::FbxCache* pointCacheOf(fbxsdk::FbxNode& node);
 
-/// A vertex cache on the geometry, whose file is at the place; its folder is made. `withScene`: the file has its name
-/// when the scene is saved, where the platform can do that. False, with the reason noted, when the folder cannot be
-/// made.
+/// A vertex cache on the geometry, with its file at that location; its folder is created. `withScene`: the file is
+/// renamed when the scene is saved, where the platform supports that. False, with the reason noted, when the folder
+/// cannot be created.
 bool attachPointCache(fbxsdk::FbxManager& manager, fbxsdk::FbxGeometry& geometry, const PointCachePlace& place,
                       const char* name, bool maya, bool withScene);
 
-/// Null, or why the points of the mesh are not those of the range.
+/// Null, or why the points of the mesh do not match the range.
 const char* pointCacheFault(const TnFbxMesh& mesh, const TnFbxTime& range);
 
-/// Whether the file can be written; `status` says why it cannot.
+/// Whether the file can be written; `status` has the reason otherwise.
 bool openPointCache(fbxsdk::FbxCache& cache, const TnFbxMesh& mesh, const TnFbxTime& range, const PointCacheForm& form,
                     fbxsdk::FbxStatus& status);
-/// One sample for each frame of the range. Only closing says whether it worked.
+/// One sample for each frame of the range. Only closing reports whether it worked.
 void writePointSamples(fbxsdk::FbxCache& cache, const TnFbxMesh& mesh, const TnFbxTime& range,
                        const PointCacheForm& form);
 

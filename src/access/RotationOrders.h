@@ -10,7 +10,7 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// One table for both directions; where an order of the library stands twice, its first row is the way back.
+/// One table for both directions; where an order of the library occurs twice, its first row is used for the reverse.
 struct OrderRow {
     fbxsdk::FbxEuler::EOrder fbx;
     TnFbxTransform::EFbxTransformRotationOrder library;
@@ -25,7 +25,7 @@ inline constexpr OrderRow kRotationOrders[] = {
     {fbxsdk::FbxEuler::eOrderSphericXYZ, TnFbxTransform::kFbxRotationOrderXYZ},
 };
 
-// kept: what is no order reads as ZXY, not as the first
+// kept: a number that is no order reads as ZXY, not as the first
 inline constexpr OrderRow kFallbackOrder = {fbxsdk::FbxEuler::eOrderZXY, TnFbxTransform::kFbxRotationOrderZXY};
 
 inline TnFbxTransform::EFbxTransformRotationOrder rotationOrderOf(fbxsdk::FbxEuler::EOrder order) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The samples of one channel while they are made: as long as they are all the same there is only one.
+// The samples of one channel under construction: stored as one as long as they are all equal.
 #pragma once
 
 #include "TnFbxChannel.h"
@@ -17,14 +17,14 @@ namespace Tarnell::Fbx::detail {
 /// One sample per frame, from the first frame on.
 class SampleRun {
 public:
-    /// Forgets what it holds. `total`: how many samples there will be.
+    /// Removes all samples. `total`: how many samples there will be.
     void begin(std::size_t total) {
         mValues.clear();
         mCount = 0;
         mTotal = total;
     }
 
-    /// Whether adding the value ends that all samples are one: from then on each takes memory.
+    /// Whether adding the value ends the single-sample form: from then on each takes memory.
     bool spreadsWith(float value) const { return mValues.empty() && mCount > 0 && !haveSameBits(value, mFirst); }
 
     void add(float value) {
@@ -47,7 +47,7 @@ public:
         mCount = mTotal;
     }
 
-    /// Whether all samples are there.
+    /// Whether all samples have been added.
     bool isComplete() const { return mCount > 0 && mCount == mTotal; }
     bool isOneValue() const { return mValues.empty(); }
     float first() const { return mFirst; } ///< of a run that is not empty
@@ -61,7 +61,7 @@ public:
         }
     }
 
-    /// Into a channel, which takes them over unless some are missing or the range is none.
+    /// Stores them in a channel, which takes them over unless some are missing or the range is empty.
     bool moveInto(TnFbxChannel& channel, const TnFbxTime& time) {
         if (!isComplete()) {
             return false;
@@ -70,11 +70,11 @@ public:
                                : channel.moveAnimatedValues(time, std::move(mValues));
     }
 
-    /// One float per frame, whether they are the same or not.
+    /// One float per frame, whether they are equal or not.
     std::vector<float> takeAll() { return mValues.empty() ? std::vector<float>(mCount, mFirst) : std::move(mValues); }
 
 private:
-    std::vector<float> mValues; // empty while all are as the first
+    std::vector<float> mValues; // empty while all are equal to the first
     float mFirst = 0.0f;
     std::size_t mCount = 0;
     std::size_t mTotal = 0;

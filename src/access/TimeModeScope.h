@@ -1,20 +1,20 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The rate that the calling thread counts frames at belongs to the host: an operation that sets it gives it back.
+// The frame rate of the calling thread belongs to the host: an operation that sets it restores it.
 #pragma once
 
 #include <fbxsdk.h>
 
 namespace Tarnell::Fbx::detail {
 
-/// Keeps the thread's time mode for as long as it lives and restores it at the end, also when something throws.
+/// Saves the thread's time mode and restores it at the end of the scope, also when something throws.
 class TimeModeScope {
 public:
     TimeModeScope()
         : mMode(fbxsdk::FbxTime::GetGlobalTimeMode()),
           mCustomRate(fbxsdk::FbxTime::GetFrameRate(fbxsdk::FbxTime::eCustom)) {}
-    /// With the scene's rate in force meanwhile. No scene: the mode stays.
+    /// Sets the scene's rate for the scope. No scene: the mode stays.
     explicit TimeModeScope(const fbxsdk::FbxScene* scene) : TimeModeScope() {
         if (scene != nullptr) {
             const fbxsdk::FbxGlobalSettings& settings = scene->GetGlobalSettings();
@@ -22,7 +22,7 @@ public:
         }
     }
     ~TimeModeScope() {
-        // The custom rate is kept beside the mode, also while another mode is in force.
+        // The custom rate is stored besides the mode, also while another mode is set.
         fbxsdk::FbxTime::SetGlobalTimeMode(fbxsdk::FbxTime::eCustom, mCustomRate);
         fbxsdk::FbxTime::SetGlobalTimeMode(mMode, mCustomRate);
     }

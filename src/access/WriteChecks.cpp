@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Sentences about values that are no numbers, rates that are none, and meshes that contradict themselves.
+// Warnings about values that are not finite, invalid rates, and inconsistent meshes.
 #include "WriteChecks.h"
 
 #include "calls/LastError.h"
@@ -84,7 +84,7 @@ void visitLens(ChannelCheck& check, TnFbxCamera& camera) {
     }
 }
 
-/// Whether all of `count` triples are numbers; `get` fills one.
+/// Whether all of `count` triples are finite; `get` fills one.
 template <class Get>
 bool areFinite(int count, const Get& get) {
     for (int i = 0; i < count; ++i) {

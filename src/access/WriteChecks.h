@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What is written as it was handed over, though no program can make sense of it: the host learns of it.
+// Warnings about data that is written as passed, though no program can interpret it.
 #pragma once
 
 #include "ObjectWarnings.h"
@@ -13,15 +13,15 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// A rate that is none, or that the file does not tell.
+/// An invalid rate, or one that the file does not state.
 void warnAboutRate(float framesPerSecond, bool isCustom);
 
-// Of one object that is written; only of what is written of it.
+// About one object that is written; only about its written data.
 
 void check(TnFbxTransform& transform, ObjectWarnings& warnings);
 void check(TnFbxCamera& camera, ObjectWarnings& warnings);
 void check(TnFbxLight& light, ObjectWarnings& warnings);
-/// Of a mesh its geometry alone.
+/// Of a mesh its geometry only.
 void check(const TnFbxMesh& mesh, ObjectWarnings& warnings);
 
 } // namespace Tarnell::Fbx::detail

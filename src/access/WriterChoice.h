@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Which of a registry's writers writes a file, in which version, and one export.
+// The choice of a registry's writer for a file and of its version, and one export.
 #pragma once
 
 #include "TnFbxWriteInfo.h"
@@ -14,8 +14,8 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// The first FBX writer whose description has the word; the native one when there is none. The registry is the
-/// platform's, in which others may have entered writers of their own.
+/// The first FBX writer whose description contains the word; the native one when there is none. The registry is the
+/// platform's, to which others may have added writers of their own.
 template <class Registry>
 int findWriter(const Registry& registry, const char* word) {
     const int count = registry.GetWriterFormatCount();
@@ -28,7 +28,7 @@ int findWriter(const Registry& registry, const char* word) {
     return registry.GetNativeWriterFormat();
 }
 
-/// By compatibility version; what is none of them is the newest. There was no change of the format in 2015.
+/// By compatibility version; an invalid one means the newest. There was no change of the format in 2015.
 inline const char* versionString(TnFbxWriteInfo::eCompatibilityVersion version) {
     constexpr const char* kVersions[] = {"FBX201000", "FBX201100", "FBX201200", "FBX201300", "FBX201400"};
     constexpr const char* kNewestVersion = "FBX201600";

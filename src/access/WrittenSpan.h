@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What is said of all nodes that are written: in which order they turn, and over which time they are animated.
+// Settings of all written nodes: their rotation order, and the span over which they are animated.
 #pragma once
 
 #include <fbxsdk.h>
@@ -10,8 +10,8 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// An order is in force where a node's rotation settings are active, which they are of cameras and of lights with a
-/// direction. Elsewhere every program turns in the order XYZ.
+/// An order is used where a node's rotation settings are active, as they are for cameras and for lights with a
+/// direction. Elsewhere every program rotates in the order XYZ.
 inline void enforceRotationOrder(fbxsdk::FbxNode& node) {
     fbxsdk::FbxEuler::EOrder order = fbxsdk::FbxEuler::eOrderXYZ;
     node.GetRotationOrder(fbxsdk::FbxNode::eSourcePivot, order);
@@ -35,7 +35,7 @@ public:
         mFound = true;
     }
 
-    /// Nothing without a span.
+    /// No effect without a span.
     void store(fbxsdk::FbxScene& scene, fbxsdk::FbxAnimStack* stack) const {
         if (mFound && stack != nullptr) {
             stack->SetLocalTimeSpan(mSpan);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How the facade and the adapter note the outcome of an operation for `lastError()` and `lastWarnings()`.
+// How the facade and the adapter record the outcome of an operation for `lastError()` and `lastWarnings()`.
 #pragma once
 
 #include <stdexcept>
@@ -10,18 +10,18 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Notes why the operation fails, with what a terminal would obey escaped. Always false, so that failing is one line:
+/// Records why the operation fails, with control characters escaped. Always false, so that failing is one line:
 /// `return fail("no node");`.
 bool fail(const std::string& reason);
 
-/// The same, with the name of the file in front, unless the reason names it already. `standIn` is the reason when there
-/// is none.
+/// The same, with the name of the file in front, unless the reason contains it already. `standIn` is the reason when
+/// there is none.
 bool failAbout(const std::string& fileName, const char* reason, const char* standIn);
 
-/// What `work` returns. A fault that the platform throws fails it: that a file was changed while it was read may be
-/// noticed late. A lack of memory goes on to the host.
+/// What `work` returns. A fault that the platform throws makes it fail: a change of the file while it was read may be
+/// detected late. std::bad_alloc is passed on to the host.
 ///
-/// kept: so does what the platform throws for a layer element without a direct array
+/// kept: so is what the platform throws for a layer element without a direct array
 template <class Work>
 bool failOnFault(const std::string& fileName, const Work& work) {
     try {
@@ -34,13 +34,13 @@ bool failOnFault(const std::string& fileName, const Work& work) {
     }
 }
 
-/// Forgets the last failure. Always true.
+/// Clears the last failure. Always true.
 bool succeed();
 
 /// Adds a sentence to the warnings of the call, unless it is among them already.
 void warn(const std::string& text);
 
-/// One call of the host's: the warnings start anew with the outermost one of a thread.
+/// One call of the host: the warnings are cleared by the outermost one of a thread.
 class CallScope {
 public:
     CallScope();

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What one call hands out, held against `memoryLimit()`.
+// The memory of one call's results, checked against `memoryLimit()`.
 #pragma once
 
 #include <cstdint>
@@ -9,17 +9,17 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Counts the bytes of the objects that a call hands out. Once they go beyond the limit nothing more is granted, but
-/// the rest is still counted, so that the failure can say what would have been needed.
+/// Counts the bytes of the objects that a call returns. Once they exceed the limit nothing more is granted, but
+/// the rest is still counted, so that the failure can state how much would have been needed.
 class MemoryAccount {
 public:
-    /// Counts anew, against the limit in force now.
+    /// Restarts the count, against the limit at this time.
     void begin();
-    /// From here on nothing is limited.
+    /// Removes the limit from here on.
     void end() { *this = {}; }
     /// False when the bytes counted so far, these included, are more than the limit.
     bool take(std::uint64_t bytes);
-    /// Of bytes that were granted and turned out not to be needed.
+    /// Returns bytes that were granted and are not needed.
     void giveBack(std::uint64_t bytes) { mNeeded -= bytes; }
     std::uint64_t limit() const { return mLimit; }
     bool exceeded() const { return mNeeded > mLimit; }
@@ -31,7 +31,7 @@ private:
     std::uint64_t mLimit = UINT64_MAX; // outside of a call: none
 };
 
-/// A number of bytes for people: "512 bytes", "3.4 MiB".
+/// A number of bytes for display: "512 bytes", "3.4 MiB".
 std::string describeBytes(std::uint64_t bytes);
 
 } // namespace Tarnell::Fbx::detail

@@ -11,7 +11,7 @@ namespace {
 
 struct Character {
     char32_t code = 0;
-    std::size_t size = 0; // 0: no UTF-8
+    std::size_t size = 0; // 0: invalid UTF-8
 };
 
 /// The character at the front of the text, which is not empty.

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Texts of files on their way to people.
+// Texts of files, escaped for display.
 #pragma once
 
 #include <string>
@@ -9,9 +9,9 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// The text without anything that a terminal would obey: control characters, those of the upper half and those that
-/// turn the direction of writing among them, become "\x1B" or "\u009B", and so do bytes that are no UTF-8. Line ends
-/// stay only when `keepLines`.
+/// The text without control characters for terminals: these, those of the upper half and bidirectional
+/// marks included, become "\x1B" or "\u009B", and so do bytes that are not UTF-8. Line ends
+/// stay only with `keepLines`.
 std::string printable(std::string_view text, bool keepLines = false);
 
 } // namespace Tarnell::Fbx::detail

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How cameras and lights of files stand to those of hosts, and cameras that look at a point.
+// The axes of cameras and lights in files relative to those of hosts, and cameras that look at a point.
 #pragma once
 
 #include <fbxsdk.h>
@@ -17,7 +17,8 @@ inline const fbxsdk::FbxVector4 kLightTurn(-90.0, 0.0, 0.0);
 
 fbxsdk::FbxAMatrix turnOf(const fbxsdk::FbxVector4& angles);
 
-/// A camera in the axes of hosts, turned toward the point and rolled, in degrees; as it is where that has no direction.
+/// A camera in the axes of hosts, rotated toward the point and rolled, in degrees; unchanged where that has no
+/// direction.
 fbxsdk::FbxAMatrix aimed(const fbxsdk::FbxAMatrix& camera, const fbxsdk::FbxVector4& point,
                          const fbxsdk::FbxVector4& up, double roll);
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Cameras: where they look, what drives their lens, and the film behind it, all of it worked out at every frame.
+// Cameras: their direction, lens and film, computed at every frame.
 #include "Aim.h"
 #include "Lens.h"
 #include "Placement.h"
@@ -24,7 +24,8 @@ constexpr std::size_t kChannels = TnFbxCamera::kFbxCameraFilmOffsetY + 1;
 
 // ---- Lens and film ----
 
-/// The focal length, both angles and the film agree: what the mode says drives the lens, and the rest follows.
+/// The focal length, both angles and the film are consistent: the value that the mode names drives the lens, and the
+/// rest follows.
 Lens lensAt(FbxCamera& source, TnFbxCamera::EFbxCameraApertureMode mode, const FbxTime& time) {
     Lens lens{};
     lens.width = source.FilmWidth.EvaluateValue(time) * source.FilmSqueezeRatio.EvaluateValue(time);
@@ -49,13 +50,13 @@ TnFbxCamera::EFbxCameraApertureMode apertureModeOf(const FbxCamera& source) {
     }
 }
 
-// ---- Where it looks ----
+// ---- Direction ----
 
 FbxVector4 asVector(const fbxsdk::FbxDouble3& value) { return {value[0], value[1], value[2]}; }
 
 FbxVector4 minus(const FbxVector4& a, const FbxVector4& b) { return {a[0] - b[0], a[1] - b[1], a[2] - b[2]}; }
 
-/// What a camera looks at, in the world.
+/// The point that a camera looks at, in the world.
 class Aim {
 public:
     Aim(const Scene& scene, FbxNode& node) : mNode(node), mCamera(*node.GetCamera()), mUnit(scene.unit()) {}
@@ -68,12 +69,12 @@ public:
         }
         FbxVector4 point = asVector(mCamera.InterestPosition.EvaluateValue(time));
         for (int i = 0; i < 3; ++i) {
-            point[i] *= mUnit; // nodes were scaled to centimetres, and this is none
+            point[i] *= mUnit; // nodes were scaled to centimetres, the attribute's point was not
         }
         return point;
     }
 
-    /// Toward the node above it where there is one.
+    /// Toward the parent where there is one.
     FbxVector4 upAt(const FbxTime& time) const {
         if (FbxNode* above = mNode.GetTargetUp()) {
             return minus(worldMatrix(*above, time).GetT(), worldMatrix(mNode, time).GetT());
@@ -81,7 +82,8 @@ public:
         return asVector(mCamera.UpVector.EvaluateValue(time));
     }
 
-    /// The camera in the world, turned toward the point and rolled; the node's own turn where that has no direction.
+    /// The camera in the world, rotated toward the point and rolled; with the node's own rotation where that has no
+    /// direction.
     FbxAMatrix matrixAt(const FbxTime& time) const {
         return aimed(worldMatrix(mNode, time) * turnOf(kCameraTurn), pointAt(time), upAt(time),
                      mCamera.Roll.EvaluateValue(time));
@@ -116,7 +118,7 @@ Placement cameraPlacement(Scene& scene, FbxNode& node, const TnFbxReadInfo& info
     return placement;
 }
 
-/// The aim as the channels have it: from the camera's parent when the placement is.
+/// The aim as the channels have it: relative to the camera's parent when the placement is.
 struct AimValues {
     FbxVector4 point, up;
 };

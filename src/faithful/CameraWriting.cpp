@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Cameras: lens and film that agree whichever of them a reader believes, both film offsets, and what they look at.
+// Cameras: lens and film that are consistent whichever of them a reader uses, both film offsets, and the aim.
 #include "Aim.h"
 #include "Decomposition.h"
 #include "Lens.h"
@@ -36,7 +36,7 @@ Channels3 channelsFrom(TnFbxCamera& camera, Channel first) {
 
 // ---- Lens and film ----
 
-/// A new camera's film, which nobody chose, counts millimetres: a film of 24 inches is none.
+/// A new camera's default film is in millimetres: a film of 24 inches does not exist.
 double inchesPerUnit(TnFbxCamera& camera) {
     const TnFbxChannel& width = channelOf(camera, TnFbxCamera::kFbxCameraApertureWidth);
     const TnFbxChannel& height = channelOf(camera, TnFbxCamera::kFbxCameraApertureHeight);
@@ -59,7 +59,7 @@ FbxCamera::EApertureMode apertureModeOf(Mode mode) {
     }
 }
 
-/// What drives the lens, besides the film.
+/// The value that drives the lens, besides the film.
 std::vector<Channel> driversOf(Mode mode) {
     switch (mode) {
     case TnFbxCamera::kFbxApertureHorizontalAndVertical:
@@ -107,7 +107,7 @@ public:
     }
     Lens still() const { return agreeingWith(staticValue); }
 
-    /// Angles that the lens does not hang on are left static: readers work them out.
+    /// Angles that do not drive the lens stay static: readers compute them.
     bool isKeyed(Channel channel) const {
         const bool drives = std::find(mDrivers.begin(), mDrivers.end(), channel) != mDrivers.end();
         return drives ||
@@ -125,7 +125,7 @@ private:
         stated.width *= mInches;
         stated.height *= mInches;
         Lens lens = agreeing(stated, mMode);
-        for (const LensRow& row : kLensRows) { // as they are, not worked out from themselves
+        for (const LensRow& row : kLensRows) { // unchanged, not computed from themselves
             if (std::find(mDrivers.begin(), mDrivers.end(), row.channel) != mDrivers.end()) {
                 lens.*row.value = stated.*row.value;
             }
@@ -158,7 +158,7 @@ void writeLens(KeyWriter& keys, TnFbxCamera& source, FbxCamera& camera) {
     }
 }
 
-// ---- Where it looks ----
+// ---- Direction ----
 
 /// The direction that a camera's rotation and its look-at channels give.
 class LookAt {
@@ -176,7 +176,7 @@ public:
 
     const FrameRange& range() const { return mRange; }
 
-    /// The camera turned toward the point with its up vector, and rolled.
+    /// The camera rotated toward the point with its up vector, and rolled.
     FbxAMatrix aimedAt(std::int64_t frame) const {
         return aimed(placeAt(frame), vectorAt(TnFbxCamera::kFbxCameraLookAtPositionX, frame),
                      vectorAt(TnFbxCamera::kFbxCameraUpPositionX, frame), valueAt(TnFbxCamera::kFbxCameraRoll, frame));
@@ -198,14 +198,14 @@ public:
                });
     }
 
-    /// The rotation is that of a camera with a target, roll and all.
+    /// The rotation is that of a camera with a target, including the roll.
     bool isRolledAim() const {
         const TnFbxChannel& roll = channelOf(mCamera, TnFbxCamera::kFbxCameraRoll);
         if (!changes(roll) && staticValue(roll) == 0.0) {
             return false;
         }
         for (std::int64_t frame = mRange.first; frame <= mRange.last; ++frame) {
-            constexpr double kSameDirection = 1e-4; // of floats that were worked out
+            constexpr double kSameDirection = 1e-4; // of computed floats
             const FbxAMatrix own = placeAt(frame), aim = aimedAt(frame);
             for (int axis = 0; axis < 3; ++axis) {
                 for (int component = 0; component < 3; ++component) {
@@ -262,7 +262,7 @@ private:
 
 constexpr const char* kAimed = "has a look-at point and no rotation: it is written turned toward the point";
 
-/// The point, the up vector and the roll; a target where they turn the camera.
+/// The point, the up vector and the roll; a target where they determine the rotation.
 void writeLookAt(WrittenScene& scene, TnFbxCamera& source, fbxsdk::FbxNode& node, FbxCamera& camera) {
     KeyWriter& keys = scene.keys();
     keys.write(camera.InterestPosition, channelsFrom(source, TnFbxCamera::kFbxCameraLookAtPositionX));
@@ -271,7 +271,7 @@ void writeLookAt(WrittenScene& scene, TnFbxCamera& source, fbxsdk::FbxNode& node
 
     const LookAt lookAt(keys, source);
     const bool turns = scene.info().getComputeCameraRotation() && lookAt.wantsAim();
-    if (!turns && !lookAt.isRolledAim()) { // the rotation says where it looks
+    if (!turns && !lookAt.isRolledAim()) { // the rotation determines the direction
         return;
     }
     fbxsdk::FbxNode& target = scene.addNode(source.getName() + " target");

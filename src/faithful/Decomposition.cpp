@@ -41,7 +41,7 @@ Vector perpendicularTo(const Vector& a) {
     return scaled(across, 1.0 / length(across));
 }
 
-/// The first axis, second axis and third axis of a rotation, of which `known` says whether they have a direction.
+/// The first, second and third axis of a rotation, where `known` states whether they have a direction.
 void completeAxes(std::array<Vector, 3>& axes, std::array<bool, 3> known) {
     for (std::size_t i = 0; i < 3; ++i) {
         const Vector& next = axes[(i + 1) % 3];
@@ -63,7 +63,7 @@ void completeAxes(std::array<Vector, 3>& axes, std::array<bool, 3> known) {
     }
 }
 
-/// The axes that an order turns about, in turn, and +1 where they follow each other as X, Y and Z do.
+/// The axes of an order, in turn, and +1 where they are in the cyclic order of X, Y and Z.
 struct OrderAxes {
     int first, second, third;
     double sign;
@@ -166,7 +166,7 @@ Vector anglesNear(const Matrix& rotation, RotationOrder order, const Vector& nea
     const double cosine = std::hypot(at(rotation, i, i), at(rotation, j, i));
     Vector angles{};
     angles[second] = std::atan2(sine, cosine) * kDegrees;
-    if (cosine < kGimbalCosine) { // the first and the third turn about the same axis: the first goes on as it was
+    if (cosine < kGimbalCosine) { // the first and the third rotate about the same axis: the first stays unchanged
         angles[first] = near[first];
         const Matrix rest = rotation * turnAbout(i, -near[first]);
         angles[third] = std::atan2(-sign * at(rest, i, j), at(rest, j, j)) * kDegrees;

@@ -15,7 +15,7 @@ namespace Tarnell::Fbx::faithful {
 using Vector = std::array<double, 3>;
 using RotationOrder = TnFbxTransform::EFbxTransformRotationOrder;
 
-/// Matrix = T · R · H · S, the right one first. H adds to X `skew[0]` of Y and `skew[1]` of Z, and to Y `skew[2]` of Z.
+/// Matrix = T · R · H · S, the rightmost first. H adds to X `skew[0]` of Y and `skew[1]` of Z, and to Y `skew[2]` of Z.
 struct Parts {
     Vector position{};
     fbxsdk::FbxAMatrix rotation; // nothing else
@@ -23,23 +23,23 @@ struct Parts {
     Vector skew{};
 };
 
-/// The parts of an affine matrix. `signs` says which axes are scaled by a negative number; where they do not mirror as
-/// the matrix does, X is scaled the other way. An axis of no length is taken perpendicular to the others.
+/// The parts of an affine matrix. `signs` states which axes are scaled by a negative number; where they do not mirror
+/// as the matrix does, the sign of X is reversed. An axis of no length is taken perpendicular to the others.
 Parts decompose(const fbxsdk::FbxAMatrix& matrix, const Vector& signs);
 
 /// The rotation by these angles, in degrees.
 fbxsdk::FbxAMatrix rotationOf(const Vector& angles, RotationOrder order);
 
-/// Of all angles, in degrees, that turn like the rotation those nearest to `near`.
+/// Of all angles, in degrees, that give the rotation, those nearest to `near`.
 Vector anglesNear(const fbxsdk::FbxAMatrix& rotation, RotationOrder order, const Vector& near);
 
-/// Whether two rotations turn alike, but for rounding.
+/// Whether two rotations are equal up to rounding.
 bool turnAlike(const fbxsdk::FbxAMatrix& a, const fbxsdk::FbxAMatrix& b);
 
 /// The sign of a matrix's determinant: −1 where it mirrors, 0 where it flattens.
 double handedness(const fbxsdk::FbxAMatrix& matrix);
 
-/// What a normal becomes under a matrix: of unit length, or zero where its surface is flattened to a line.
+/// The image of a normal under a matrix: of unit length, or zero where its surface is flattened to a line.
 fbxsdk::FbxVector4 transformedNormal(const fbxsdk::FbxAMatrix& matrix, const fbxsdk::FbxVector4& normal);
 
 } // namespace Tarnell::Fbx::faithful

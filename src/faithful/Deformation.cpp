@@ -23,7 +23,7 @@ using Deformer = fbxsdk::FbxDeformer;
 using Point = fbxsdk::FbxVector4;
 using fbxsdk::FbxTime;
 
-/// A cache's file is open as long as this lives.
+/// Keeps a cache's file open for the lifetime of the object.
 class OpenCache {
 public:
     explicit OpenCache(fbxsdk::FbxCache& cache) : mCache(cache), mOpen(cache.OpenFileForRead()) {}
@@ -41,7 +41,7 @@ private:
     bool mOpen;
 };
 
-/// Maya does not say what a channel holds; its exporter names channels of normals so.
+/// Maya does not state what a channel holds; its exporter names channels of normals so.
 constexpr std::string_view kNormalsEnding = "_normals";
 
 int typeOf(const fbxsdk::FbxVertexCacheDeformer& deformer) {
@@ -54,7 +54,7 @@ int typeOf(const fbxsdk::FbxVertexCacheDeformer& deformer) {
                                                                          : type;
 }
 
-/// The first one that holds what is asked for.
+/// The first one that holds the requested data.
 fbxsdk::FbxVertexCacheDeformer* activeCacheOf(const fbxsdk::FbxMesh& mesh, int type) {
     for (int i = 0; i < mesh.GetDeformerCount(Deformer::eVertexCache); ++i) {
         auto* deformer = fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(mesh.GetDeformer(i, Deformer::eVertexCache));
@@ -72,7 +72,7 @@ bool readMayaCache(fbxsdk::FbxCache& cache, const fbxsdk::FbxString& channelName
     return channel >= 0 && cache.Read(channel, time, buffer.data(), static_cast<unsigned int>(buffer.size() / 3));
 }
 
-/// Between two samples in a straight line.
+/// Linear interpolation between two samples.
 bool readMaxCache(fbxsdk::FbxCache& cache, double frame, std::vector<double>& buffer) {
     constexpr double most = std::numeric_limits<int>::max();
     const double held = std::fmin(std::fmax(frame, 0.0), most);
@@ -99,13 +99,13 @@ bool readMaxCache(fbxsdk::FbxCache& cache, double frame, std::vector<double>& bu
 
 constexpr double kFullPercent = 100.0;
 
-/// How much of a channel's target is in force.
+/// The effective percentage of a channel's target.
 struct TargetShare {
     int target;
     double share;
 };
 
-/// A weight and the target that is full there; −1 is the mesh itself.
+/// A weight and the target that is fully reached there; −1 is the mesh itself.
 using Knot = std::pair<double, int>;
 
 /// In the order of their weights, with the mesh itself at 0.
@@ -114,14 +114,14 @@ std::vector<Knot> knotsOf(fbxsdk::FbxBlendShapeChannel& channel) {
     const double* full = count > 0 ? channel.GetTargetShapeFullWeights() : nullptr;
     std::vector<Knot> knots = {{0.0, -1}};
     for (int i = 0; full != nullptr && i < count; ++i) {
-        // A target that were full at 0 would always be: some exporters write weights of points here.
+        // A target at 0 would always be fully reached: some exporters write weights of points here.
         knots.emplace_back(full[i] != 0.0 ? full[i] : kFullPercent, i);
     }
     std::stable_sort(knots.begin(), knots.end(), [](const Knot& a, const Knot& b) { return a.first < b.first; });
     return knots;
 }
 
-/// The two targets that a weight lies between; beyond the ends it goes on as it came.
+/// The two targets that a weight lies between; beyond the ends it is extrapolated.
 std::array<TargetShare, 2> sharesAt(fbxsdk::FbxBlendShapeChannel& channel, double weight) {
     const std::vector<Knot> knots = knotsOf(channel);
     std::size_t upper = 1;

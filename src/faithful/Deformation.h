@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The points of a mesh as its caches, blend shapes and skins leave them at a time.
+// The points of a mesh after its caches, blend shapes and skins at a time.
 #pragma once
 
 #include "Scene.h"
@@ -12,12 +12,12 @@
 
 namespace Tarnell::Fbx::faithful {
 
-/// What the deformers of a mesh made of its points.
+/// The result of a mesh's deformers for its points.
 struct DeformedMesh {
     std::vector<fbxsdk::FbxVector4> points;
     /// Points of skins are in the world, others in the mesh's own space.
     bool inWorld = false;
-    /// The points moved against each other: the normals stored in the file are no longer theirs.
+    /// The points moved relative to each other: the normals stored in the file are no longer valid.
     bool reshaped = false;
     /// The normals of the corners in the mesh's own space, where a cache has them.
     std::vector<fbxsdk::FbxVector4> normals;
@@ -25,19 +25,19 @@ struct DeformedMesh {
     bool mirrored = false;
 };
 
-/// The control points at a time. Caches that cannot be read are warned of.
+/// The control points at a time. Unreadable caches cause a warning.
 DeformedMesh deformedPoints(Scene& scene, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh, const fbxsdk::FbxTime& time);
 
 // Each of the three.
 
-/// Replaces the points by those of the mesh's active cache; false when it has none that can be read.
+/// Replaces the points by those of the mesh's active cache; false when it has no readable one.
 bool applyPointCache(Scene& scene, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh, const fbxsdk::FbxTime& time,
                      std::vector<fbxsdk::FbxVector4>& points);
-/// The normals of all corners from the mesh's active cache; none when it has none that can be read.
+/// The normals of all corners from the mesh's active cache; none when it has no readable one.
 std::vector<fbxsdk::FbxVector4> cachedNormals(const fbxsdk::FbxMesh& mesh, const fbxsdk::FbxTime& time);
 /// Whether any shape moved a point.
 bool applyBlendShapes(fbxsdk::FbxMesh& mesh, const fbxsdk::FbxTime& time, std::vector<fbxsdk::FbxVector4>& points);
-/// Moves the points into the world; false, and nothing changed, for a mesh without clusters.
+/// Moves the points to the world; false, and nothing changed, for a mesh without clusters.
 bool applySkins(fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh, const fbxsdk::FbxTime& time, DeformedMesh& deformed);
 
 } // namespace Tarnell::Fbx::faithful

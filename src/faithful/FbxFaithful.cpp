@@ -16,7 +16,7 @@ struct FbxFaithful::File {
 
 namespace {
 
-/// One call of the host's, which a fault of the file fails.
+/// One call of the host, which fails for a fault of the file.
 template <class Work>
 bool call(const TnFbxReadInfo& info, const Work& work) {
     const detail::CallScope scope;

@@ -22,7 +22,7 @@ FbxTime timeOf(std::int64_t frame, double rate) {
     return time;
 }
 
-/// The keys of one curve: a straight line needs its two ends, and values that stay the same are the only line whose
+/// The keys of one curve: a straight line needs its two ends, and constant values are the only line whose
 /// samples are exact.
 class LinearKeys {
 public:
@@ -42,7 +42,7 @@ public:
         mAny = true;
     }
 
-    /// To be called in the end.
+    /// To be called at the end.
     void holdLast() {
         if (mAny && mFrame != mKeyed) {
             set(mFrame, mValue);
@@ -63,13 +63,13 @@ private:
     float mValue = 0.0f;
 };
 
-/// Rates may be as far apart as numbers are.
+/// Rates may differ arbitrarily.
 std::int64_t wholeFrame(double frame) {
     constexpr double kFarthest = 1e15;
     return static_cast<std::int64_t>(std::clamp(frame, -kFarthest, kFarthest));
 }
 
-/// What a frame takes of which several channels make a key: three curves with a time and a value each.
+/// The memory of a frame in which several channels have a key: three curves with a time and a value each.
 constexpr std::uint64_t kFrameBytes = 48;
 
 double sampleOf(const TnFbxChannel& channel, std::int64_t frame) {
@@ -171,7 +171,7 @@ void KeyWriter::write(fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property, const 
     for (std::size_t i = 0; i < 3; ++i) {
         values[static_cast<int>(i)] = staticValue(*channels[i]);
     }
-    property.Set(values); // before the keys: it is the value of components that have none
+    property.Set(values); // before the keys: it is the value of components without any
     for (std::size_t i = 0; i < 3; ++i) {
         writeKeys(property, kComponents[i], *channels[i], 1.0);
     }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From channels to properties of the scene: static values, and keys at the exact times of frames.
+// Conversion of channels to properties of the scene: static values, and keys at the exact times of frames.
 #pragma once
 
 #include "access/WrittenSpan.h"
@@ -26,29 +26,29 @@ struct FrameRange {
     std::int64_t count() const { return last - first + 1; }
 };
 
-/// Whether the channel has samples that are not all the same.
+/// Whether the channel has samples that are not all equal.
 bool changes(const TnFbxChannel& channel);
 
-/// The value of a channel that does not change, and what one that does has without its samples.
+/// The value of a constant channel, and that of an animated one apart from its samples.
 double staticValue(const TnFbxChannel& channel);
 
-/// Three channels of which a property is made, in its own order.
+/// Three channels that make up a property, in its own order.
 using Channels3 = std::array<const TnFbxChannel*, 3>;
 using ValueAt = std::function<double(std::int64_t frame)>;
 
-/// Writes into one layer, and keeps the span of what it wrote.
+/// Writes into one layer, and records the span of what it wrote.
 class KeyWriter {
 public:
     /// `rate`: frames per second of channels that state none.
     KeyWriter(fbxsdk::FbxAnimLayer& layer, double rate) : mLayer(layer), mRate(rate) { mMemory.begin(); }
 
-    /// `factor` times the static value, and the samples as keys. Of samples that stay the same the first and the last
+    /// `factor` times the static value, and the samples as keys. Of equal consecutive samples the first and the last
     /// one become keys.
     void write(fbxsdk::FbxPropertyT<fbxsdk::FbxDouble>& property, const TnFbxChannel& channel, double factor = 1.0);
     void write(fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property, const Channels3& channels);
 
-    /// Keys out of a function of the frame; `component` of a property of three numbers, else null. Nothing where the
-    /// values do not change.
+    /// Keys of a function of the frame; `component` of a property of three numbers, else null. None where the
+    /// values are constant.
     void writeKeys(fbxsdk::FbxProperty property, const char* component, const FrameRange& range,
                    const ValueAt& valueAt);
 
@@ -60,7 +60,7 @@ public:
     double valueAt(const TnFbxChannel& channel, std::int64_t frame, const FrameRange& range) const;
 
     detail::WrittenSpan& span() { return mSpan; }
-    /// What the keys of several channels take together.
+    /// The total memory of the keys of several channels.
     const detail::MemoryAccount& memory() const { return mMemory; }
 
 private:

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Focal length, film and angles of a camera, which say the same thing.
 #pragma once
 
 #include "TnFbxCamera.h"
@@ -13,6 +11,7 @@ namespace Tarnell::Fbx::faithful {
 inline constexpr double kMillimetresPerInch = 25.4;
 inline constexpr double kRadiansPerDegree = 0.017453292519943295769;
 
+/// Focal length, film and angles of a camera, which must be consistent.
 struct Lens {
     double focalLength;                             // millimetres
     double width, height;                           // of the film, inches
@@ -29,7 +28,7 @@ inline double angleOf(double inches, double focalLength) {
     return 2.0 * std::atan2(inches * kMillimetresPerInch / 2.0, focalLength) / kRadiansPerDegree;
 }
 
-/// What the mode says drives the lens, and the rest follows from it and from the film.
+/// The value that the mode names drives the lens, and the rest follows from it and from the film.
 inline Lens agreeing(Lens lens, TnFbxCamera::EFbxCameraApertureMode mode) {
     if (mode == TnFbxCamera::kFbxApertureHorizontal && isAngle(lens.fieldOfView)) {
         lens.focalLength = focalLengthOf(lens.width, lens.fieldOfView);
@@ -37,7 +36,7 @@ inline Lens agreeing(Lens lens, TnFbxCamera::EFbxCameraApertureMode mode) {
         lens.focalLength = focalLengthOf(lens.height, lens.fieldOfView);
     } else if (mode == TnFbxCamera::kFbxApertureHorizontalAndVertical && isAngle(lens.fieldOfViewX) &&
                isAngle(lens.fieldOfViewY)) {
-        // Two angles give the film its shape; its width is believed, and its height where they but round it.
+        // Two angles give the film its shape; its width is kept, and its height where they differ by rounding only.
         constexpr double kRounding = 1e-6;
         lens.focalLength = focalLengthOf(lens.width, lens.fieldOfViewX);
         const double height =

@@ -25,13 +25,13 @@ Placement lightPlacement(Scene& scene, FbxNode& node, bool global) {
     placement.matrixAt = [place = placement.matrixAt, turn = turnOf(kLightTurn)](const FbxTime& time) {
         return place(time) * turn;
     };
-    placement.nearOwn = false; // they fit where they turn a light with the axes of hosts
+    placement.nearOwn = false; // used only where they give the rotation in the axes of hosts
     return placement;
 }
 
 std::array<double, 4> opaque(const fbxsdk::FbxDouble3& colour) { return {colour[0], colour[1], colour[2], 1.0}; }
 
-/// Of what has no channel the value at the frame of the static ones is handed out.
+/// For values without a channel the value at the frame of the static ones is returned.
 double sizeAt(const Scene& scene, const FbxNode& node, fbxsdk::FbxPropertyT<fbxsdk::FbxDouble>& property) {
     const double now = property.EvaluateValue(scene.now());
     const Timeline& timeline = scene.timeline();
@@ -84,7 +84,7 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxNull&
             detail::lookUp(detail::kNullLooks, source->Look.Get<fbxsdk::FbxEnum>(), detail::kOtherNullLook));
         null.setNullSize(toFloat(sizeAt(scene, node, source->Size)));
     } else {
-        null.setNullLookType(TnFbxNull::kFbxNullLookNone); // a node that carries nothing shows nothing
+        null.setNullLookType(TnFbxNull::kFbxNullLookNone); // a node without an attribute is not drawn
     }
     return readNode(scene, info, node, static_cast<TnFbxTransform&>(null));
 }

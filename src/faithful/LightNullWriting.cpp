@@ -14,7 +14,7 @@ namespace {
 constexpr double kFullIntensity = 100.0; // of a light in a file
 constexpr const char* kAlpha = "the alpha of lights is not written: files have none";
 
-/// The way back through a table of reading.
+/// The reverse direction of a table for reading.
 template <class Value, std::size_t kCount>
 int numberOf(const detail::EnumRow<Value> (&rows)[kCount], Value value, int otherwise) {
     for (const detail::EnumRow<Value>& row : rows) {

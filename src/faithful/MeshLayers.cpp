@@ -29,7 +29,7 @@ MappedValues<Value> firstMapped(fbxsdk::FbxMesh& mesh, const ElementOf& elementO
     return {};
 }
 
-/// What light passes through: the factor times the mean of the colour that passes.
+/// The transmitted fraction of light: the factor times the mean of the transmitted colour.
 double transparencyOf(const fbxsdk::FbxSurfaceLambert& material) {
     const fbxsdk::FbxDouble3 colour = material.TransparentColor.Get();
     return material.TransparencyFactor.Get() * (colour[0] + colour[1] + colour[2]) / 3.0;
@@ -93,7 +93,7 @@ MeshColours::MeshColours(fbxsdk::FbxMesh& mesh, const fbxsdk::FbxNode& node)
             mMaterialIndex = &element->GetIndexArray();
         }
     }
-    if (mMapping == Element::eNone && !mMaterials.empty()) { // nothing is said of which: it is the first one
+    if (mMapping == Element::eNone && !mMaterials.empty()) { // the material is not specified: it is the first one
         mMapping = Element::eAllSame;
         mOneMaterial = true;
     }

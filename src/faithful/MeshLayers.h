@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a mesh's layers say about each corner of its polygons: of every kind of element the first one that says
-// anything, in every mapping and reference.
+// The values of a mesh's layers at each corner of its polygons: of every kind of element the first one with
+// values, in every mapping and reference.
 #pragma once
 
 #include "access/LayerValues.h"
@@ -14,12 +14,12 @@
 
 namespace Tarnell::Fbx::faithful {
 
-/// The values of one element. They are asked for one by one: values that still stand in a file need not be in memory
-/// all at once for that.
+/// The values of one element. They are read one by one, so that values in a file need not be in memory
+/// all at once.
 template <class Value>
 class MappedValues {
 public:
-    /// Nothing is found.
+    /// No values.
     MappedValues() = default;
 
     /// Throws std::runtime_error when the element has no direct array.
@@ -36,7 +36,7 @@ public:
             return mValues.at(corner.polygon);
         case fbxsdk::FbxLayerElement::eAllSame:
             return mValues.at(0);
-        default: // edges have two polygons, and which of their values a corner takes is not said
+        default: // edges have two polygons, and it is not defined which of their values a corner has
             return std::nullopt;
         }
     }
@@ -53,7 +53,7 @@ private:
 MappedValues<fbxsdk::FbxVector4> meshNormals(fbxsdk::FbxMesh& mesh);
 MappedValues<fbxsdk::FbxVector2> meshUVs(fbxsdk::FbxMesh& mesh);
 
-/// The vertex colours or, without any, those of the materials of a node that the mesh stands on.
+/// The vertex colours or, without any, those of the materials of the mesh's node.
 class MeshColours {
 public:
     MeshColours(fbxsdk::FbxMesh& mesh, const fbxsdk::FbxNode& node);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A mesh at one frame: where its points are, how its polygons go round, and what its layers say about their corners.
+// A mesh at one frame: its points, the order of its polygons' corners, and the values of its layers at the corners.
 #include "Decomposition.h"
 #include "Deformation.h"
 #include "MeshLayers.h"
@@ -37,7 +37,7 @@ using fbxsdk::FbxNode;
 using fbxsdk::FbxTime;
 using fbxsdk::FbxVector4;
 
-/// The space that points are handed out in.
+/// The space of the returned points.
 struct Space {
     FbxAMatrix fromMesh;  // for points in the mesh's own space
     FbxAMatrix fromWorld; // for points in the world
@@ -45,7 +45,7 @@ struct Space {
 
 Space spaceOf(const TnFbxReadInfo& info, FbxNode& node, const FbxTime& time) {
     const FbxAMatrix geometric = geometricMatrix(node);
-    if (!info.getTransformPoints()) { // the object's own: its transform places them
+    if (!info.getTransformPoints()) { // the object's own: its transform applies to them
         return {geometric, worldMatrix(node, time).Inverse()};
     }
     if (!info.getGlobalTransform()) {
@@ -54,7 +54,7 @@ Space spaceOf(const TnFbxReadInfo& info, FbxNode& node, const FbxTime& time) {
     return {worldMatrix(node, time) * geometric, FbxAMatrix()};
 }
 
-/// A mesh's points where they are handed out, and what its normals become there.
+/// The transform of a mesh's points to the returned space, and that of its normals.
 class PlacedMesh {
 public:
     PlacedMesh(DeformedMesh&& deformed, const Space& space) : mDeformed(std::move(deformed)), mSpace(space) {
@@ -83,8 +83,8 @@ private:
 
 // ---- Polygons ----
 
-/// The corners in the order in which they are handed out: of mirrored meshes each polygon goes the other way round,
-/// from the same corner on.
+/// The corners in the returned order: the polygons of mirrored meshes are reversed,
+/// starting at the same corner.
 class Corners {
 public:
     Corners(FbxMesh& mesh, bool reversed) : mMesh(mesh), mReversed(reversed) {}
@@ -126,7 +126,7 @@ void fillLayout(FbxMesh& source, const Corners& corners, MeshArrays& arrays) {
 
 // ---- Normals ----
 
-/// Corners of one point that had one normal share one again, when the points of their mesh have moved.
+/// Corners of one point that shared a normal share a new one, when the points of their mesh have moved.
 class ReshapedNormals {
 public:
     ReshapedNormals(FbxMesh& mesh, const Corners& corners, const MappedValues<FbxVector4>& stored,
@@ -156,7 +156,7 @@ private:
         return {corner.controlPoint, stored[0], stored[1], stored[2]};
     }
 
-    /// Twice the area long.
+    /// With a length of twice the area.
     void addPolygonNormals(const Corners& corners, const std::vector<FbxVector4>& points) {
         int polygon = -1;
         FbxVector4 first, last;
@@ -241,7 +241,7 @@ bool fillColours(FbxMesh& source, const FbxNode& node, const Corners& corners, M
     return found;
 }
 
-/// What layers say, in the layout that is filled, too, unless it is that of another node's mesh.
+/// The values of layers, in the layout that is filled, too, unless it is that of another node's mesh.
 void fillCorners(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, bool isAlike, MeshArrays& arrays,
                  TnFbxMesh& mesh) {
     const Corners corners(source, placed.mirrored());
@@ -253,7 +253,7 @@ void fillCorners(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed,
     mesh.setValidColours(fillColours(source, node, corners, arrays));
 }
 
-/// `alike` is what the mesh of another node with the same source became; null when there is none.
+/// `alike` is the result for the mesh of another node with the same source; null when there is none.
 void fillMesh(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, std::int64_t cornerCount,
               const MeshInstances::Geometry* alike, TnFbxMesh& mesh) {
     MeshArrays arrays(mesh);
@@ -272,7 +272,7 @@ void fillMesh(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, st
     }
 }
 
-/// What the arrays of a mesh take: for each corner an index, a normal, a texture coordinate and a colour.
+/// The memory of a mesh's arrays: for each corner an index, a normal, a texture coordinate and a colour.
 std::uint64_t bytesOf(const FbxMesh& source, std::int64_t cornerCount) {
     constexpr std::uint64_t perPoint = 3 * sizeof(float);
     constexpr std::uint64_t perCorner = sizeof(int) + (3 + 2 + 4) * sizeof(float);
@@ -287,7 +287,7 @@ std::uint64_t bytesOfAnother(const FbxMesh& source, std::int64_t cornerCount) {
                     MeshArrays::bytesOfAnother(source.GetControlPointsCount(), cornerCount));
 }
 
-/// What was handed out for another node with the same mesh; null when nothing was, or nothing that fits.
+/// The result for another node with the same mesh; null when there is none, or none that matches.
 const MeshInstances::Geometry* findAlike(Scene& scene, const MeshInstances::Source& source, std::size_t pointCount) {
     const MeshInstances::Geometry* found = scene.instances().find(source);
     return found != nullptr && found->controlPoints.size() == pointCount ? found : nullptr;
@@ -302,7 +302,7 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
         return detail::fail(scene.fileName() + ": the mesh of \"" + node.GetName() + "\" has too many corners");
     }
     detail::noteRepairedCorners(scene.fileName(), node, source, scene.warnings());
-    // Whether the corners go the other way round shows later: there may be nothing alike after all.
+    // Whether the corners are reversed is known later: there may be no match after all.
     const MeshInstances::Source straight = {&source, false}, reversed = {&source, true};
     const bool isKnown = scene.instances().find(straight) != nullptr || scene.instances().find(reversed) != nullptr;
     const std::uint64_t all = bytesOf(source, cornerCount);
@@ -324,7 +324,7 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
             scene.giveBackBytes(scene.instances().keep(kept, mesh));
         }
         return true;
-    } catch (const std::runtime_error& error) { // what the platform says of a layer element without its array
+    } catch (const std::runtime_error& error) { // the platform's message about a layer element without its array
         mesh.initMesh();
         return detail::fail(scene.fileName() + ": the layers of \"" + node.GetName() + "\" are damaged (" +
                             error.what() + ")");

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes: their points in the space of their node, and a point cache where those move.
+// Meshes: their points in the space of their node, and a point cache where those are animated.
 #include "Decomposition.h"
 #include "PlacementWriting.h"
 #include "Writing.h"
@@ -44,7 +44,7 @@ TnFbxTime cacheRange(const WrittenScene& scene) {
     return range;
 }
 
-/// Turns each polygon round, from the same corner on.
+/// Reverses each polygon, starting at the same corner.
 void reversePolygons(const TnFbxMesh& source, TnFbxMesh& mesh) {
     int start = 0;
     for (int polygon = 0; polygon < source.getNumberOfPolygons(); ++polygon) {
@@ -85,8 +85,8 @@ void transformNormals(TnFbxMesh& mesh, const FbxAMatrix& matrix) {
     }
 }
 
-/// A mesh whose points its transform has placed already, with its points in its own space again; nothing where the
-/// transform flattens them.
+/// A mesh whose points are already transformed, with its points in its own space again; nothing where the
+/// transform is singular.
 std::optional<TnFbxMesh> unplaced(WrittenScene& scene, const TnFbxMesh& source) {
     TnFbxMesh mesh(source);
     const FbxAMatrix place = staticMatrixOf(source);
@@ -110,7 +110,7 @@ std::optional<TnFbxMesh> unplaced(WrittenScene& scene, const TnFbxMesh& source) 
     return mesh;
 }
 
-/// Takes the mesh's cache away again.
+/// Removes the mesh's cache again.
 void dropCache(fbxsdk::FbxNode& node) {
     fbxsdk::FbxCache* cache = detail::pointCacheOf(node);
     if (fbxsdk::FbxVertexCacheDeformer* deformer = detail::pointCacheDeformerOf(node)) {
@@ -138,7 +138,7 @@ bool writeCache(WrittenScene& scene, const TnFbxMesh& mesh, fbxsdk::FbxNode& nod
     if (!detail::openPointCache(cache, mesh, range, form, status)) {
         return detail::fail(status.GetErrorString());
     }
-    detail::writePointSamples(cache, mesh, range, form); // only closing says whether it worked
+    detail::writePointSamples(cache, mesh, range, form); // only closing reports whether it worked
     return cache.CloseFile(&status) || detail::fail(status.GetErrorString());
 }
 
@@ -164,7 +164,7 @@ void addGeometry(WrittenScene& scene, const TnFbxMesh& mesh, fbxsdk::FbxNode& no
 }
 
 /// Meshes that share all their arrays are one, on several nodes; each point cache has a mesh of its own. `mesh` must
-/// live as long as the scene.
+/// be valid as long as the scene.
 void addShared(WrittenScene& scene, const TnFbxMesh& mesh, fbxsdk::FbxNode& node) {
     if (mesh.getNumberOfControlPointSets() > 1) {
         addGeometry(scene, mesh, node);

@@ -57,7 +57,7 @@ Parts partsAt(const Placement& placement, const FbxTime& time) {
     return decompose(placement.matrixAt(time), valueAt(placement.node.LclScaling, time));
 }
 
-/// The node's own angles, which say how often it turned, where they are what turns it.
+/// The node's own angles, which include full turns, where they give its rotation.
 class OwnAngles {
 public:
     OwnAngles(const Placement& placement, RotationOrder order)
@@ -65,7 +65,7 @@ public:
 
     bool fit() const { return mFit; }
     Vector at(const FbxTime& time) const { return valueAt(mNode.LclRotation, time); }
-    /// They no longer fit once they do not turn like this.
+    /// They are not used once they give another rotation.
     void compare(const Vector& angles, const Matrix& rotation) {
         mFit = mFit && turnAlike(rotationOf(angles, mOrder), rotation);
     }
@@ -91,7 +91,7 @@ void readStill(Scene& scene, const Placement& placement, RotationOrder order, Tn
     setStill(object, valuesOf(parts, own.fit() ? hint : anglesNear(parts.rotation, order, near)));
 }
 
-/// Whether two matrices are the same but for where they are.
+/// Whether two matrices are equal except for their translation.
 bool standAlike(const Matrix& a, const Matrix& b) {
     for (int axis = 0; axis < 3; ++axis) {
         for (int component = 0; component < 3; ++component) {
@@ -103,7 +103,7 @@ bool standAlike(const Matrix& a, const Matrix& b) {
     return true;
 }
 
-/// The placement at one frame after the other. What does not turn or grow is taken apart once.
+/// The placement at one frame after the other. A rotation and scale that do not change are decomposed once.
 class MovingPlacement {
 public:
     MovingPlacement(Scene& scene, const Placement& placement, RotationOrder order)
@@ -195,7 +195,7 @@ Matrix parentMatrix(FbxNode& node, const FbxTime& time) {
 
 Matrix localMatrix(FbxNode& node, const FbxTime& time) {
     const Matrix parent = parentMatrix(node, time);
-    if (handedness(parent) == 0.0) { // what is flattened cannot be seen from the parent
+    if (handedness(parent) == 0.0) { // a flattened space has no inverse
         return node.EvaluateLocalTransform(time, kSource, /*pApplyTarget*/ false, /*pForceEval*/ false);
     }
     return parent.Inverse() * worldMatrix(node, time);

@@ -34,7 +34,7 @@ Vector valuesAt(const KeyWriter& keys, const Channels3& channels, std::int64_t f
             keys.valueAt(*channels[2], frame, range)};
 }
 
-/// Order and turn of a node; they are in force.
+/// Order and rotation of a node, both active.
 void setOrder(FbxNode& node, RotationOrder order, const NodeAxes& axes) {
     node.SetRotationOrder(kSource, detail::rotationOrderOf(order));
     if (axes.turn != nullptr) {
@@ -61,7 +61,7 @@ private:
     std::vector<Vector> mValues;
 };
 
-/// The rotation and shear of an object, shared by two nodes: the upper one turns and stretches, the lower one turns.
+/// The rotation and shear of an object, shared by two nodes: the upper rotates and stretches, the lower rotates.
 void writeSkewed(KeyWriter& keys, TnFbxTransform& object, FbxNode& upper, FbxNode& lower) {
     const Channels3 rotation = channelsFrom(object, TnFbxTransform::kFbxTransformRotationX);
     const Channels3 skew = channelsFrom(object, TnFbxTransform::kFbxTransformSkewX);
@@ -129,7 +129,7 @@ FbxAMatrix matrixAt(const KeyWriter& keys, TnFbxTransform& object, std::int64_t 
 }
 
 FbxAMatrix staticMatrixOf(const TnFbxTransform& object) {
-    TnFbxTransform copy(object); // channels are handed out by objects that may change
+    TnFbxTransform copy(object); // channels are returned by objects that may change
     return composedOf(copy, [](const Channels3& channels) -> Vector {
         return {static_cast<double>(channels[0]->getValue()), static_cast<double>(channels[1]->getValue()),
                 static_cast<double>(channels[2]->getValue())};

@@ -14,15 +14,15 @@
 
 namespace Tarnell::Fbx::faithful {
 
-/// How the axes of a kind of node stand to those of its objects.
+/// The axes of a kind of node relative to those of its objects.
 struct NodeAxes {
     const fbxsdk::FbxVector4* turn;       ///< null: they are the same
     std::array<std::size_t, 3> scaleFrom; ///< the object's axis that each axis of the node is
 };
 extern const NodeAxes kSameAxes, kCameraAxes, kLightAxes;
 
-/// A new node of the object's name where the object is. One that is skewed stands below a node of its own, called
-/// after it, which scales it askew.
+/// A new node of the object's name with the object's placement. A skewed one is below another node, named
+/// after it, which scales it along rotated axes.
 fbxsdk::FbxNode& addPlacedNode(WrittenScene& scene, TnFbxTransform& object, const NodeAxes& axes);
 
 /// The object at a frame: T · R · H · S.

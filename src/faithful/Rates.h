@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Frames per second as they are meant: those of television are fractions, of which hosts and files say roundings.
+// Exact frame rates: those of television are fractions, which hosts and files state rounded.
 #pragma once
 
 #include <fbxsdk.h>
@@ -31,13 +31,13 @@ inline constexpr RateRow kWholeRates[] = {
     {fbxsdk::FbxTime::eFrames120, 120.0}, {fbxsdk::FbxTime::eFrames1000, 1000.0},
 };
 
-/// Whether there are so many frames per second at all.
+/// Whether the number of frames per second is valid.
 inline bool isRate(double rate) { return std::isfinite(rate) && rate > 0.0; }
 
-/// The mode of a rate and how many frames per second it has exactly: 23.976 and 29.97 stand for fractions. A rate
+/// The mode of a rate and its exact number of frames per second: 23.976 and 29.97 mean fractions. A rate
 /// without a mode is a custom one.
 inline RateRow exactRate(float framesPerSecond) {
-    constexpr double kTolerance = 2e-6; // 23.976 lies 1e-6 below what it stands for
+    constexpr double kTolerance = 2e-6; // 23.976 is 1e-6 below the rate it means
     const auto rate = static_cast<double>(framesPerSecond);
     for (const RateRow& row : kTelevisionRates) {
         if (std::fabs(rate - row.rate) < kTolerance * row.rate) {

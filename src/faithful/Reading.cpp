@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The walk over the nodes of a kind.
+// The traversal of the nodes of a kind.
 #include "Reading.h"
 
 #include "access/NodeWalk.h"
@@ -19,7 +19,7 @@ namespace {
 using Attribute = fbxsdk::FbxNodeAttribute;
 using fbxsdk::FbxNode;
 
-/// The cameras through which an application looks at its scene are no part of it.
+/// The cameras of an application's own views are not part of the scene.
 bool isProducer(fbxsdk::FbxScene& scene, FbxNode& node) {
     const auto* camera = fbxsdk::FbxCast<fbxsdk::FbxCamera>(node.GetNodeAttribute());
     return camera != nullptr && scene.GlobalCameraSettings().IsProducerCamera(camera);
@@ -63,7 +63,7 @@ constexpr bool kNeedsMeshes = false;
 template <>
 constexpr bool kNeedsMeshes<TnFbxMesh> = true;
 
-/// The nodes that a read is about, parents before their children.
+/// The nodes of a read, parents before their children.
 template <class Object>
 std::vector<FbxNode*> nodesOf(Scene& scene, const TnFbxReadInfo& info) {
     if (kNeedsMeshes<Object>) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the facade calls when a read is to be faithful, and the readers of single nodes.
+// The entry points of faithful reads for the facade, and the readers of single nodes.
 #pragma once
 
 #include "Scene.h"
@@ -25,7 +25,7 @@ bool readObjects(const TnFbxReadInfo& info, Object** objects, int& count);
 template <class Object>
 bool readObjects(Scene& scene, const TnFbxReadInfo& info, Object** objects, int& count);
 
-/// Puts meshes in the place of surfaces, and warns of those that cannot become any.
+/// Replaces surfaces by meshes, and warns of those that cannot be converted.
 void triangulateSurfaces(Scene& scene);
 
 extern template bool readObjects(const TnFbxReadInfo&, TnFbxMesh**, int&);
@@ -35,8 +35,8 @@ extern template bool readObjects(const TnFbxReadInfo&, TnFbxMarker**, int&);
 extern template bool readObjects(const TnFbxReadInfo&, TnFbxNull**, int&);
 extern template bool readObjects(const TnFbxReadInfo&, TnFbxTransform**, int&);
 
-// One node, which must be of the kind, into an object as it was made. False, with the reason noted, when there is no
-// room for what it takes or when it is damaged.
+// One node, which must be of the kind, into a new object. False, with the reason noted, when there is not enough
+// memory or the node is damaged.
 bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxMesh& mesh);
 bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxCamera& camera);
 bool readNode(Scene& scene, const TnFbxReadInfo& info, fbxsdk::FbxNode& node, TnFbxLight& light);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From values that can be worked out at any time to channels: a static value, and samples where they differ.
+// Conversion of values that can be computed at any time to channels: a static value, and samples where they differ.
 #pragma once
 
 #include "Scene.h"
@@ -16,7 +16,7 @@ namespace Tarnell::Fbx::faithful {
 
 using TransformChannel = TnFbxTransform::EFbxTransformChannelType;
 
-/// Rounds to the nearest float; what is too large becomes infinite, as IEEE 754 has it.
+/// Rounds to the nearest float; a value out of range becomes infinite, as in IEEE 754.
 inline float toFloat(double value) { return static_cast<float>(value); }
 
 inline void setStatic(TnFbxTransform& object, TransformChannel channel, float value) {
@@ -27,7 +27,7 @@ void setStatic(Object& object, Channel channel, float value) {
     object.setValue(channel, value);
 }
 
-/// The samples of all channels while they are made. Only those that change take memory for each frame.
+/// The samples of all channels under construction. Only those that change take memory for each frame.
 template <std::size_t kCount>
 class Runs {
 public:
@@ -37,11 +37,11 @@ public:
         }
     }
 
-    /// False, with the reason noted, when there is no room.
+    /// False, with the reason noted, when there is not enough memory.
     template <class Values>
     bool add(const Values& values) {
         for (std::size_t i = 0; i < kCount; ++i) {
-            const float value = toFloat(values[i]) + 0.0f; // zero is not told from minus zero
+            const float value = toFloat(values[i]) + 0.0f; // zero and minus zero are equal
             if (mRuns[i].spreadsWith(value) && !mScene.grantSamples(1)) {
                 return false;
             }
@@ -58,7 +58,7 @@ private:
 };
 
 /// Fills some consecutive channels, from the first one on: `valuesAt(time)` gives an array of their values. False, with
-/// the reason noted, when there is no room for the samples.
+/// the reason noted, when there is not enough memory for the samples.
 template <std::size_t kCount, class Object, class Channel, class ValuesAt>
 bool fillChannels(Scene& scene, bool animated, Object& object, Channel firstChannel, ValuesAt&& valuesAt) {
     const auto channelAt = [firstChannel](std::size_t i) {
@@ -82,7 +82,7 @@ bool fillChannels(Scene& scene, bool animated, Object& object, Channel firstChan
         }
     }
     for (std::size_t i = 0; i < kCount; ++i) {
-        if (!samples[i].isOneValue()) { // samples that are all alike are no animation
+        if (!samples[i].isOneValue()) { // samples that are all equal are no animation
             object.moveValuesAt(channelAt(i), timeline.record(scene.frame()), samples[i].takeAll());
         }
     }

@@ -18,10 +18,10 @@ using detail::failAbout;
 
 namespace {
 
-/// From there on a float no longer tells neighbouring frames apart.
+/// From there on a float does not distinguish adjacent frames.
 constexpr std::int64_t kMostFrames = std::int64_t{1} << 24;
 
-/// What a scene plays at when its file says "custom" and no rate.
+/// The rate of a scene whose file says "custom" without one.
 constexpr double kRateOfNoRate = 30.0;
 
 template <class Object, class Owner>
@@ -93,7 +93,7 @@ bool Scene::load(const TnFbxReadInfo& info) {
     const fbxsdk::FbxGlobalSettings& settings = mScene->GetGlobalSettings();
     const double unit = settings.GetSystemUnit().GetScaleFactor();
     detail::convertToCentimetres(*mScene);
-    const double left = settings.GetSystemUnit().GetScaleFactor(); // a unit that is no number
+    const double left = settings.GetSystemUnit().GetScaleFactor(); // a unit that is not a number
     mUnit = left < 1.0 || left > 1.0 || std::isnan(left) ? 1.0 : unit;
     detail::convertToYUp(*mScene);
     return selectStack(info.getAimationStackName()) && selectFrames(info);
@@ -188,7 +188,7 @@ bool Scene::moves(fbxsdk::FbxNode& node) {
         above.push_back(at);
         moving = isKeyed(at->LclTranslation) || isKeyed(at->LclRotation) || isKeyed(at->LclScaling);
     }
-    // Of those above a node that moves only that node itself is known to.
+    // The visited nodes are at and below the animated one, or none of them is animated.
     for (const fbxsdk::FbxNode* each : above) {
         mMoves[each] = moving;
     }

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// One file as one read wants it: loaded, normalised, with the animation stack and the frames that were asked for.
 #pragma once
 
 #include "Timeline.h"
@@ -19,6 +17,7 @@
 
 namespace Tarnell::Fbx::faithful {
 
+/// One file prepared for one read: loaded, normalised, with the requested animation stack and frames.
 class Scene {
 public:
     Scene() = default;
@@ -26,7 +25,7 @@ public:
     Scene(const Scene&) = delete;
     Scene& operator=(const Scene&) = delete;
 
-    /// Once. False, with the reason noted, when the file cannot be read or has not what the options name.
+    /// To be called once. False, with the reason noted, when the file cannot be read or lacks what the options name.
     bool load(const TnFbxReadInfo& info);
 
     bool isLoaded() const { return mScene != nullptr; }
@@ -34,35 +33,35 @@ public:
     fbxsdk::FbxScene& scene() const { return *mScene; }
     const std::string& fileName() const { return mFileName; }
     const Timeline& timeline() const { return mTimeline; }
-    /// Of the file, in centimetres, which the scene counts in.
+    /// Of the file, in centimetres, the unit of the scene.
     double unit() const { return mUnit; }
     /// Frames per second of the file, exactly.
     double fileRate() const { return mFileRate; }
     /// The frame of the static values, and its time.
     float frame() const { return mFrame; }
     fbxsdk::FbxTime now() const { return mNow; }
-    /// Another one; false, with the reason noted, when it is no number.
+    /// Sets another one; false, with the reason noted, when it is not a number.
     bool setFrame(float frame);
 
     /// Whether the property, or anything of the object, is keyed in the stack.
     bool isKeyed(fbxsdk::FbxProperty property) const;
     bool isKeyed(const fbxsdk::FbxObject& object) const;
-    /// Whether the node, or one that it hangs on, is keyed in its transform.
+    /// Whether the node, or one of its ancestors, has keys for its transform in the stack.
     bool moves(fbxsdk::FbxNode& node);
 
-    /// Asks for the memory of so many channels with a sample for every frame. False, with the reason noted.
+    /// Reserves the memory of that many channels with a sample for every frame. False, with the reason noted.
     bool grantSamples(std::int64_t channels);
-    /// The same for other bytes that are handed out.
+    /// The same for other bytes that are returned.
     bool grantBytes(std::uint64_t bytes);
     void giveBackBytes(std::uint64_t bytes) { mMemory.giveBack(bytes); }
-    /// What was granted is no longer held.
+    /// Returns memory that was granted.
     void forgetMemory() {
         mMemory.begin();
         mInstances.forget();
     }
-    /// The meshes among what was granted that have nodes in common.
+    /// The granted meshes that several nodes share.
     detail::MeshInstances& instances() { return mInstances; }
-    /// About nodes, for who reads them to report.
+    /// Warnings about nodes, reported by the readers.
     detail::ObjectWarnings& warnings() { return mWarnings; }
 
 private:
@@ -72,7 +71,7 @@ private:
 
     detail::TimeModeScope mTimeMode;        // an import leaves the file's
     fbxsdk::FbxManager* mManager = nullptr; // owned
-    fbxsdk::FbxScene* mScene = nullptr;     // the manager's
+    fbxsdk::FbxScene* mScene = nullptr;     // owned by the manager
     std::string mFileName;
     fbxsdk::FbxAnimStack* mStack = nullptr; // null: nothing is animated
     std::vector<fbxsdk::FbxAnimLayer*> mLayers;

@@ -45,7 +45,7 @@ void turnPair(Vector& a, Vector& b, double c, double s) {
 
 } // namespace
 
-/// One-sided Jacobi: the basis is turned, by less than 45 degrees at a time, until its images are perpendicular.
+/// One-sided Jacobi: the basis is rotated, by less than 45 degrees at a time, until its images are perpendicular.
 ShearParts partsOfShear(const Vector& skew, const fbxsdk::FbxAMatrix& nearBasis) {
     Columns basis = columnsOf(nearBasis);
     Columns images{};

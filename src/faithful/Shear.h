@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A shear as what nodes can say: no node skews, but one that turns below one that scales does.
+// A shear in terms of nodes: no node skews, but a rotated one below a scaled one does.
 #pragma once
 
 #include "Decomposition.h"
@@ -17,8 +17,8 @@ struct ShearParts {
     fbxsdk::FbxAMatrix basis;
 };
 
-/// The parts of the shear that a transform has with its skews, as near as can be to those of the basis given: that of
-/// the frame before, so that they go on from frame to frame.
+/// The parts of the shear that a transform has by its skews, as close as possible to those of the basis given: that of
+/// the frame before, so that they are continuous from frame to frame.
 ShearParts partsOfShear(const Vector& skew, const fbxsdk::FbxAMatrix& nearBasis);
 
 } // namespace Tarnell::Fbx::faithful

@@ -66,7 +66,7 @@ DualQuaternion dualQuaternion(const Matrix& rotation, const Vector& translation)
     return result;
 }
 
-/// The rotation and translation that a blend stands for.
+/// The rotation and translation of a blend.
 Matrix rigidMotion(const DualQuaternion& blend) {
     const auto& r = blend.real;
     const double square = r[0] * r[0] + r[1] * r[1] + r[2] * r[2] + r[3] * r[3];
@@ -82,7 +82,7 @@ Matrix rigidMotion(const DualQuaternion& blend) {
     return matrix;
 }
 
-/// What one cluster does: the whole motion, and the same as a stretch followed by a rigid motion.
+/// The motion of one cluster: as a matrix, and as a stretch followed by a rigid motion.
 struct Influence {
     Matrix motion;
     Matrix stretch;
@@ -123,13 +123,13 @@ struct Sum {
     }
 };
 
-/// What all clusters of a mesh are evaluated with.
+/// The common data of all clusters of a mesh.
 struct Binding {
     fbxsdk::FbxNode& node;
     Matrix geometric;
     Matrix place; // of the mesh's own space, now
     FbxTime time;
-    bool stated; // otherwise the scene as it stands without animation is the pose of binding
+    bool stated; // otherwise the scene's static pose is the bind pose
 };
 
 bool statesItsBinding(const Cluster& cluster) {
@@ -137,7 +137,7 @@ bool statesItsBinding(const Cluster& cluster) {
     return !cluster.GetTransformMatrix(bound).IsIdentity() || !cluster.GetTransformLinkMatrix(linkBound).IsIdentity();
 }
 
-/// From the mesh's own space to where a cluster's link takes it; without a link to where it was bound.
+/// From the mesh's own space to where a cluster's link moves it; without a link to its bind pose.
 Matrix motionOf(const Cluster& cluster, const Binding& binding) {
     Matrix bound, linkBound;
     cluster.GetTransformMatrix(bound);
@@ -178,7 +178,7 @@ void forEachWeight(const Cluster& cluster, std::size_t pointCount, const Visit& 
     }
 }
 
-/// How much of the dual quaternions each point takes.
+/// The share of dual quaternions at each point.
 std::vector<double> dualShares(const Skin& skin, std::size_t pointCount) {
     const bool dual = skin.GetSkinningType() == Skin::eDualQuaternion;
     std::vector<double> shares(pointCount, dual ? 1.0 : 0.0);
@@ -213,7 +213,7 @@ void forEachCluster(const std::vector<Skin*>& skins, const Visit& visit) {
     }
 }
 
-/// Each influence moves what the ones before it have moved.
+/// Each influence moves the point as moved by those before it.
 std::vector<Matrix> chainedMotions(const std::vector<Skin*>& skins, const Binding& binding, std::size_t pointCount) {
     std::vector<Matrix> motions(pointCount);
     forEachCluster(skins, [&](const Cluster& cluster) {
@@ -231,7 +231,7 @@ std::vector<Matrix> chainedMotions(const std::vector<Skin*>& skins, const Bindin
     return motions;
 }
 
-/// The mean of the influences of each point; a point without any goes where its node does.
+/// The mean of the influences of each point; a point without any follows its node.
 std::vector<Matrix> blendedMotions(const std::vector<Skin*>& skins, const Binding& binding, std::size_t pointCount,
                                    Cluster::ELinkMode mode) {
     const std::vector<double> dual = dualShares(*skins.front(), pointCount);
@@ -279,7 +279,7 @@ bool applySkins(fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh, const FbxTime& tim
         ++clusters;
         binding.stated = binding.stated || statesItsBinding(cluster);
     });
-    binding.stated = binding.stated || clusters < 2; // a single bone can well have been bound at the origin
+    binding.stated = binding.stated || clusters < 2; // a single bone may well have been bound at the origin
     const std::size_t count = deformed.points.size();
     const Cluster::ELinkMode mode = skins.front()->GetCluster(0)->GetLinkMode();
     const std::vector<Matrix> motions = mode == Cluster::eAdditive ? chainedMotions(skins, binding, count)

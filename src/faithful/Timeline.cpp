@@ -9,7 +9,7 @@ namespace Tarnell::Fbx::faithful {
 
 namespace {
 
-/// A time this near to a whole frame is that frame's: files round the ticks of odd rates.
+/// A time this close to a whole frame is that frame's: files round the ticks of fractional rates.
 constexpr double kFrameTolerance = 0.01;
 
 std::int64_t wholeFrame(double frame) {

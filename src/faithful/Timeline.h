@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The frames at which a scene is sampled, and when they are.
+// The frames at which a scene is sampled, and their times.
 #pragma once
 
 #include "TnFbxTime.h"
@@ -24,7 +24,7 @@ public:
     std::int64_t last() const { return mLast; }
     std::int64_t count() const { return mLast - mFirst + 1; }
     fbxsdk::FbxTime at(double frame) const;
-    /// What channels say about their samples.
+    /// The time record of channels with these samples.
     TnFbxTime record(float frame) const;
 
 private:

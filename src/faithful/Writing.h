@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the facade calls when a write is to be faithful, and the writers of single objects.
+// The entry points of faithful writes for the facade, and the writers of single objects.
 #pragma once
 
 #include "WrittenScene.h"
@@ -17,12 +17,12 @@
 
 namespace Tarnell::Fbx::faithful {
 
-/// Writes the file and its point caches: all of them, or none, with the reason noted. Null pointers are left out.
+/// Writes the file and its point caches: all of them, or none, with the reason noted. Null pointers are skipped.
 bool writeObjects(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& cameras,
                   const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                   const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes);
 
-// One object as a node below the root. They are only read: channels are handed out by objects that may change.
+// One object as a node below the root. They are only read: channels are returned by objects that may change.
 void addObject(WrittenScene& scene, TnFbxCamera& source);
 void addObject(WrittenScene& scene, TnFbxLight& source);
 void addObject(WrittenScene& scene, TnFbxTransform& source);

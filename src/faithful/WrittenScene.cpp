@@ -47,7 +47,7 @@ bool WrittenScene::begin(const TnFbxWriteInfo& info) {
 
     const RateRow rate = exactRate(info.getFPS());
     fbxsdk::FbxGlobalSettings& settings = mScene->GetGlobalSettings();
-    const detail::TimeModeScope timeMode; // the settings would leave theirs
+    const detail::TimeModeScope timeMode; // the settings would set theirs
     if (isRate(rate.rate)) {
         mRate = rate.rate;
         settings.SetTimeMode(rate.mode);

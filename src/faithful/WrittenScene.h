@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The scene that is written: its stack, its rate, and what is said about objects.
+// The scene that is written: its stack, its rate, and the warnings about its objects.
 #pragma once
 
 #include "KeyWriting.h"
@@ -27,9 +27,9 @@ public:
     WrittenScene(const WrittenScene&) = delete;
     WrittenScene& operator=(const WrittenScene&) = delete;
 
-    /// Once. False, with the reason noted, when there is no manager to be had.
+    /// To be called once. False, with the reason noted, when no manager can be created.
     bool begin(const TnFbxWriteInfo& info);
-    /// States the span, and hands the warnings over.
+    /// States the span, and reports the warnings.
     void finish();
 
     const TnFbxWriteInfo& info() const { return *mInfo; }
@@ -50,7 +50,7 @@ public:
         return *attribute;
     }
 
-    /// The mesh that is in the scene for those arrays; null at first.
+    /// The mesh in the scene for those arrays; null at first.
     fbxsdk::FbxMesh*& meshFor(const detail::MeshArrays::Identity& arrays) { return mMeshes[arrays]; }
 
     /// A name for a point cache that no other cache of the file has, in whatever case.
@@ -59,7 +59,7 @@ public:
 private:
     const TnFbxWriteInfo* mInfo = nullptr;
     fbxsdk::FbxManager* mManager = nullptr; // owned
-    fbxsdk::FbxScene* mScene = nullptr;     // the manager's
+    fbxsdk::FbxScene* mScene = nullptr;     // owned by the manager
     fbxsdk::FbxAnimStack* mStack = nullptr;
     std::unique_ptr<KeyWriter> mKeys;
     double mRate = 24.0;

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What transforms, cameras, lights and markers do with their channels, written once over a table of each kind's
-// channels: which there are, what they are called and where they start.
+// The channel operations of transforms, cameras, lights and markers, written once over a table of each kind's
+// channels: their enumerators, names and defaults.
 #pragma once
 
 #include "TnFbxChannel.h"
@@ -25,7 +25,7 @@ struct ChannelRow {
     float defaultValue;
 };
 
-/// A channel as an index. Negative numbers become huge ones, so one comparison checks both ends.
+/// A channel as an index. Negative numbers become large ones, so one comparison checks both ends.
 template <typename Enumeration>
 constexpr std::size_t indexOf(Enumeration channel) {
     return static_cast<unsigned int>(channel);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Frames between float and int: the conversions that C++ leaves undefined outside the range of an int, given a value.
+// Conversions of frames between float and int that are defined for every value, unlike those of C++.
 #pragma once
 
 #include <cstdint>
@@ -9,7 +9,7 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Truncates toward zero. What lies beyond the range of an int becomes the int nearest to it, NaN the lowest int.
+/// Truncates toward zero. A value beyond the range of an int becomes the nearest int, NaN the lowest int.
 constexpr int truncateToInt(float value) {
     constexpr float kBeyondRange = 2147483648.0f; // 2^31, the first float above every int
     if (!(value >= -kBeyondRange)) {

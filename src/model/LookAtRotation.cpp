@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Look-at to Euler angles. Precision and grouping are part of the result, so every step says where it is double.
+// Look-at to Euler angles. Precision and grouping are part of the result, so every step states where it is double.
 #include "LookAtRotation.h"
 
 #include <cmath>
@@ -10,12 +10,12 @@ namespace Tarnell::Fbx::detail {
 
 namespace {
 
-constexpr double kRollPi = 3.1416; // kept: four decimals, so a roll of 30 comes back as 30.00007
+constexpr double kRollPi = 3.1416; // kept: four decimals, so a roll of 30 reads back as 30.00007
 constexpr double kDegreesPerRadian = 57.29577951308232;
 constexpr float kHalfPi = 1.5707964f;
 constexpr float kPoleTolerance = 1e-5f; // how close to vertical still counts as straight up or down
 
-/// The final camera axes: where it looks, its right-hand side and its up, all of unit length.
+/// The final camera axes: its direction, its right-hand side and its up, all of unit length.
 struct Axes {
     Vector3 forward, side, up;
 };
@@ -31,7 +31,7 @@ Vector3 rolled(const Vector3& up, const Vector3& side, float rollDegrees) {
 
 bool looksStraightUpOrDown(const Vector3& forward) { return std::fabs(std::fabs(forward.y) - 1.0f) < kPoleTolerance; }
 
-/// At the poles turn and roll are one rotation, and all of it goes to the roll.
+/// At the poles yaw and roll are one rotation, which is assigned to the roll.
 Vector3 anglesAtPole(const Axes& axes) {
     const bool up = std::fabs(1.0f - axes.forward.y) < kPoleTolerance;
     return {up ? kHalfPi : -kHalfPi, 0.0f, std::atan2(-axes.up.x, axes.side.x)};

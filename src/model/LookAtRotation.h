@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From an aim (position, look-at point, up vector and roll) to Euler angles: pure single-precision arithmetic.
+// Conversion of an aim (position, look-at point, up vector and roll) to Euler angles in single-precision arithmetic.
 #pragma once
 
 namespace Tarnell::Fbx::detail {

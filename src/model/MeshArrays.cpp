@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// All memory is found before the first array is filled: when there is too little, the mesh is still empty.
+// All memory is allocated before the first array is filled: on failure the mesh is still empty.
 #include "MeshArrays.h"
 
 #include <sys/mman.h>
@@ -10,10 +10,10 @@ namespace Tarnell::Fbx::detail {
 
 namespace {
 
-constexpr char kSet = 1; // its address stands for a flag that is set
+constexpr char kSet = 1; // its address represents a flag that is set
 
-/// Memory that will soon be filled as a whole takes large pages, where the system has some: most of the time of small
-/// ones goes into getting them one by one.
+/// Uses large pages for memory that will soon be filled completely, where the system has some: most of the time of
+/// small ones is spent getting them one by one.
 void preferLargePages(void* memory, std::size_t size) {
     constexpr std::uintptr_t largePage = std::uintptr_t{1} << 21U;
     const auto address = reinterpret_cast<std::uintptr_t>(memory);
@@ -31,7 +31,7 @@ void reserveExactly(SharedArray<Element>& array, std::size_t count) {
     preferLargePages(elements.data(), elements.capacity() * sizeof(Element));
 }
 
-/// Elements up to a count that memory was reserved for; those that are there already stay.
+/// Elements up to a count for which memory is reserved; existing ones stay.
 template <typename Element>
 void fill(SharedArray<Element>& array, std::size_t count, const Element& value) {
     if (array.size() < count) {

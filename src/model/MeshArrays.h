@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The arrays of a mesh as memory, for readers that fill all of them one after the other.
+// The arrays of a mesh as memory, for readers that fill one array after the other.
 #pragma once
 
 #include "TnFbxMesh.h"
@@ -13,8 +13,8 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Gives a mesh the arrays of TnFbxMesh::allocateGeometryData. The large ones are only reserved at first: each takes
-/// its memory when it is asked for, or else in the end.
+/// Gives a mesh the arrays of TnFbxMesh::allocateGeometryData. The large ones are only reserved at first: each is
+/// sized when it is requested, or else at the end.
 class MeshArrays {
 public:
     using Vector = TnFbxMesh::Vector;
@@ -25,42 +25,42 @@ public:
     MeshArrays& operator=(const MeshArrays&) = delete;
     ~MeshArrays();
 
-    /// What a mesh of one set of points takes. Nothing where a count is below 1.
+    /// The memory of a mesh with one set of points. Zero where a count is below 1.
     static std::uint64_t bytesOf(std::int64_t polygons, std::int64_t controlPoints, std::int64_t polygonVertices);
-    /// What it takes of its own at most where another one has the same polygons and texture coordinates.
+    /// Its own memory at most where another mesh has the same polygons and texture coordinates.
     static std::uint64_t bytesOfAnother(std::int64_t controlPoints, std::int64_t polygonVertices);
 
-    /// Whether other meshes have the same points, in the same memory.
+    /// Whether other meshes share the points.
     static bool sharesPoints(const TnFbxMesh& mesh) { return mesh.mGeometry.controlPoints.isShared(); }
 
-    /// Which arrays a mesh has, and which flags: the same for meshes that share all of them, as long as these live.
+    /// Which arrays a mesh has, and which flags: equal for meshes that share all of them, as long as these exist.
     using Identity = std::array<const void*, 9>;
     static Identity identityOf(const TnFbxMesh& mesh);
 
     /// To be called first; the mesh is initialised. False when a number is below 1; the mesh is empty then and no array
-    /// may be asked for.
+    /// may be requested.
     bool allocate(int polygons, int controlPoints, int polygonVertices);
-    /// Instead: points that no polygon uses.
+    /// Instead: points without polygons.
     void allocatePoints(int controlPoints);
     /// Instead: the polygons, the texture coordinates and the flags of another mesh, with points, normals and colours
     /// of its own.
     void allocateLike(const TnFbxMesh::Geometry& other);
 
-    // Each holds as many elements as it has to, defaults at first.
+    // Each has its full number of elements, defaults at first.
     int* polygonVertexSizes() { return mMesh.mGeometry.polygonVertexSizes.own().data(); }
     int* pointIndices() { return mMesh.mGeometry.pointIndices.own().data(); }
     const int* polygonVertexSizes() const { return mMesh.mGeometry.polygonVertexSizes.data(); }
     const int* pointIndices() const { return mMesh.mGeometry.pointIndices.data(); }
     TnFbxMesh::Colour* colours();
 
-    // Of the polygon vertices in order, from the first one on, as many as there are at most. Those that are not added
-    // have the defaults in the end.
+    // For the polygon vertices in order, from the first one on, at most as many as there are. Those that are not added
+    // have the defaults at the end.
     void addNormal(const TnFbxMesh::Vector& normal) { mMesh.mGeometry.normals.own().push_back(normal); }
     void addUV(const TnFbxMesh::TextureCoordinate& uv) { mMesh.mGeometry.uvs.own().push_back(uv); }
     void addNormals(const Vector* normals, std::size_t count) { append(mMesh.mGeometry.normals.own(), normals, count); }
     void addUVs(const TextureCoordinate* uvs, std::size_t count) { append(mMesh.mGeometry.uvs.own(), uvs, count); }
 
-    /// What the destructor does: defaults for all that was not asked for or added.
+    /// Called by the destructor: defaults for everything that was not requested or added.
     void complete();
 
 private:

@@ -6,7 +6,7 @@ namespace Tarnell::Fbx::detail {
 
 namespace {
 
-/// Puts the array of the pool in the place of an equal one, or the array into the pool. The bytes that are free then.
+/// Replaces an array by an equal one of the pool, or adds it to the pool. Returns the bytes that are freed.
 template <class Pool, class Element>
 std::uint64_t shareEqual(Pool& pool, SharedArray<Element>& array) {
     const auto [equal, isNew] = pool.insert(array);

@@ -1,8 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes that are handed out of one and the same source, for nodes that share it: what is equal among them is there
-// once.
+// Meshes that are read from the same source, for nodes that share it: their equal arrays are shared.
 #pragma once
 
 #include "TnFbxMesh.h"
@@ -15,12 +14,12 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Knows the meshes that were handed out, and keeps their arrays as long as it lives.
+/// Keeps the returned meshes' arrays as long as it exists.
 class MeshInstances {
 public:
     using Geometry = TnFbxMesh::Geometry;
 
-    /// What meshes with the same polygons, in the same order of their corners, come from.
+    /// The source of meshes with the same polygons, in the same order of their corners.
     struct Source {
         const void* mesh;
         bool isReversed;
@@ -29,12 +28,12 @@ public:
         }
     };
 
-    /// Whether nothing was asked about the source before.
+    /// Whether the source has not been looked up before.
     bool isFirst(const Source& source) { return mSources.insert({source, {}}).second; }
     /// The first mesh of the source that was kept; null when none was.
     const Geometry* find(const Source& source) const;
 
-    /// Lets a filled mesh share with those that were kept what is equal. How many bytes it holds less for that.
+    /// Lets a filled mesh share equal arrays with the kept ones. Returns how many bytes it holds less.
     std::uint64_t keep(const Source& source, TnFbxMesh& mesh);
 
     void forget() { *this = {}; }
@@ -45,7 +44,7 @@ private:
         Geometry geometry;
     };
 
-    /// Any order in which equal arrays are neighbours.
+    /// Any order in which equal arrays are adjacent.
     struct Less {
         template <class Element>
         bool operator()(const SharedArray<Element>& left, const SharedArray<Element>& right) const {

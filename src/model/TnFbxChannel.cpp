@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Samples at whole frames: how a range grows, and how it is evaluated in between. Samples that are all equal are kept
-// as one; whoever changes one of them spreads them out first.
+// Samples at whole frames: how a range grows, and how it is evaluated in between. Samples that are all equal are stored
+// as one; changing one of them first stores them separately.
 //
 // Spans of frames are computed in 64 bits, so that ranges may reach from the lowest int to the highest.
 #include "TnFbxChannel.h"
@@ -23,7 +23,7 @@ namespace {
 /// How close to a whole frame, in frames, still counts as that frame.
 constexpr float kExactFrameTolerance = 1e-4f;
 
-/// The frame held inside the range. NaN passes both tests.
+/// The frame clamped to the range. NaN passes both tests.
 float clampToRange(float frame, const TnFbxTime& time) {
     const float start = static_cast<float>(time.getStartFrame());
     const float end = static_cast<float>(time.getEndFrame());
@@ -33,7 +33,7 @@ float clampToRange(float frame, const TnFbxTime& time) {
     return frame > end ? end : frame;
 }
 
-/// Whether the record can say what samples belong to.
+/// Whether the record is a valid range for samples.
 bool isRange(const TnFbxTime& time) {
     return time.getStartFrame() <= time.getEndFrame() && !(time.getFrameRate() <= 0.0f); // kept: a rate of NaN passes
 }
@@ -42,7 +42,7 @@ std::size_t framesOf(const TnFbxTime& time) {
     return static_cast<std::size_t>(detail::frameCount(time.getStartFrame(), time.getEndFrame()));
 }
 
-/// Whether the range and so many values make samples.
+/// Whether the range and that many values make samples.
 bool areSamples(const TnFbxTime& time, std::size_t valueCount) {
     return isRange(time) && valueCount > 0 && framesOf(time) <= valueCount;
 }
@@ -127,7 +127,7 @@ std::size_t TnFbxChannel::countToCover(int frame) const {
     return frame > end ? static_cast<std::size_t>(detail::frameCount(start, frame)) : mCount;
 }
 
-/// Gives every sample a place of its own.
+/// Stores every sample separately.
 void TnFbxChannel::spread() {
     if (mValues.size() < mCount) {
         mValues.resize(mCount, mValues.front());
@@ -139,7 +139,7 @@ void TnFbxChannel::spread() {
 //     10 . . 13          before: samples of frames 10 to 13
 //     10 . . 13 0 0 16   covering 16 appends three, covering 7 inserts three in front
 //
-// kept: the new samples are 0, neither the static value nor the neighbour
+// kept: the new samples are 0, neither the static value nor the adjacent sample
 void TnFbxChannel::coverFrame(int frame) {
     const std::int64_t start = mTime.getStartFrame();
     const std::int64_t end = mTime.getEndFrame();
@@ -152,7 +152,7 @@ void TnFbxChannel::coverFrame(int frame) {
         mValues.insert(mValues.begin(), static_cast<std::size_t>(start - frame), 0.0f);
         mTime.setStartFrame(frame);
     } else if (frame > end) {
-        // values beyond the range, as setAnimatedValues accepts them, belong to no frame and stay out of the new ones
+        // values beyond the range, as setAnimatedValues accepts them, belong to no frame and do not become samples
         mValues.resize(static_cast<std::size_t>(end - start + 1));
         mValues.resize(static_cast<std::size_t>(frame - start + 1), 0.0f);
         mTime.setEndFrame(frame);
@@ -198,7 +198,7 @@ void TnFbxChannel::takeOver(const TnFbxTime& time, std::size_t count) {
     mAnimated = true;
 }
 
-// The animated flag plays no part here: a channel without samples is what counts as static.
+// The animated flag has no effect here: a channel without samples counts as static.
 float TnFbxChannel::getAnimatedValue(float frame) const {
     if (mValues.empty() || std::isnan(frame)) { // NaN is a frame outside every range
         return mValue;

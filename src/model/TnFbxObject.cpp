@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The named root of the scene objects.
 #include "TnFbxObject.h"
 
 namespace Tarnell::Fbx {

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Read options: storage, defaults and copying.
 #include "TnFbxReadInfo.h"
 
 namespace Tarnell::Fbx {

@@ -40,7 +40,7 @@ int TnFbxTime::getEndFrame() const { return mEndFrame; }
 
 float TnFbxTime::getFrameRate() const { return mFrameRate; }
 
-// kept: a rate of 0 is not guarded against; hosts get what the division gives
+// kept: a rate of 0 is not guarded against; hosts get the result of the division
 float TnFbxTime::getTime() const { return mFrame / mFrameRate; }
 
 float TnFbxTime::getStartTime() const { return static_cast<float>(mStartFrame) / mFrameRate; }

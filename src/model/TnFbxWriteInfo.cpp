@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Write options: storage, defaults and copying.
 #include "TnFbxWriteInfo.h"
 
 namespace Tarnell::Fbx {

@@ -27,7 +27,7 @@ fbxsdk::FbxCache* mayaCacheOf(fbxsdk::FbxMesh& mesh) {
     return cache != nullptr && cache->GetCacheFileFormat() == fbxsdk::FbxCache::eMayaCache ? cache : nullptr;
 }
 
-/// Widens the range by every channel of the cache; whether one of them has a range.
+/// Widens the range by every channel of the cache; returns whether one of them has a range.
 bool widenByChannels(fbxsdk::FbxCache& cache, float& start, float& end) {
     bool found = false;
     const int channelCount = cache.GetChannelCount();

@@ -9,7 +9,7 @@
 namespace Tarnell::Fbx::detail {
 
 /// The target that step `step` of a channel selects at a weight, by the full weights of the channel's targets; none
-/// when the weight lies nowhere between them.
+/// when the weight is between none of them.
 ///
 /// kept: every step on its own may select the first target, so below the first full weight a channel of k targets
 /// applies it k times; and a weight that equals a full weight selects nothing. The last step has no weight to compare

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Cameras: placement, aim, lens and film of a node's camera attribute, sampled, and of a producer camera, as it stands.
+// Cameras: placement, aim, lens and film of a node's camera attribute, sampled, and of a producer camera, static only.
 #include "FbxSdk.h"
 
 #include "GlobalSampler.h"
@@ -102,7 +102,7 @@ void readLens(PropertySampler& properties, const Camera& source, TnFbxCamera& ca
         camera.setApertureMode(TnFbxCamera::kFbxApertureFocalLength);
         properties.readInto(camera, TnFbxCamera::kFbxCameraFocalLength, source.FocalLength);
         break;
-    default: // a number that is no mode says nothing about the lens
+    default: // a number that is no mode does not define the lens
         break;
     }
 }
@@ -117,7 +117,7 @@ void readFilmOffset(PropertySampler& properties, const Camera& source, TnFbxCame
     }
 }
 
-/// The frames over which what a camera's rotation hangs on is animated.
+/// The frames over which the inputs of a camera's rotation are animated.
 struct LookAtRange {
     static constexpr int kNoStart = 10000000;
     static constexpr int kNoEnd = -10000000;
@@ -126,7 +126,7 @@ struct LookAtRange {
     float rate = 0.0f;
     int start = kNoStart;
     int end = kNoEnd;
-    bool isConstant = true; // no ingredient changes
+    bool isConstant = true; // no input is animated
 
     void include(FbxSdk& sdk, const TnFbxChannel& channel) {
         if (channel.getAnimated()) {
@@ -187,7 +187,7 @@ bool FbxSdk::getCamera(TnFbxTime& time, bool global, bool useSampleFPS, float sa
     return scope.finish(succeed());
 }
 
-/// The look-at channels of a camera that has a target; whether it has one.
+/// The look-at channels of a camera that has a target; returns whether it has one.
 bool FbxSdk::getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node, TnFbxCamera& camera,
                              fbxsdk::FbxAMatrix& geometric, PropertySampler& properties) {
     fbxsdk::FbxNode* target = node.GetTarget();
@@ -214,7 +214,7 @@ bool FbxSdk::getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node
     return true;
 }
 
-/// The rotation toward the look-at point, for every frame at which one of its ingredients is animated.
+/// The rotation toward the look-at point, for every frame at which one of its inputs is animated.
 void FbxSdk::setLookAtRotation(TnFbxCamera& camera) {
     const LookAtRange range = lookAtRange(*this, camera);
     const detail::SampleRange frames = {range.start, range.end};

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From a camera to a node's camera attribute: film, planes and lens, static and keyed.
+// Conversion of a camera to a node's camera attribute: film, planes and lens, static and keyed.
 #include "CurveWriting.h"
 
 #include "calls/LastError.h"
@@ -27,7 +27,7 @@ void writeFilmSize(ChannelWriter& writer, TnFbxCamera& source, Camera& camera) {
     }
 }
 
-/// Only what the aperture mode says that the lens hangs on.
+/// Only what drives the lens in this aperture mode.
 void writeLens(ChannelWriter& writer, TnFbxCamera& source, Camera& camera) {
     switch (source.getApertureMode()) {
     case TnFbxCamera::kFbxApertureHorizontalAndVertical:
@@ -47,7 +47,7 @@ void writeLens(ChannelWriter& writer, TnFbxCamera& source, Camera& camera) {
         camera.SetApertureMode(Camera::eFocalLength);
         writer.write(camera.FocalLength, source.getCameraChannel(TnFbxCamera::kFbxCameraFocalLength));
         break;
-    default: // a number that is no mode says nothing about the lens
+    default: // a number that is no mode does not define the lens
         break;
     }
 }
@@ -77,7 +77,7 @@ void writeFilmOffset(ChannelWriter& writer, TnFbxCamera& source, Camera& camera)
                                 TnFbxCamera::kDefaultCameraFilmOffsetX);
     const float y = writeOffset(writer, camera.FilmOffsetY, source.getCameraChannel(TnFbxCamera::kFbxCameraFilmOffsetY),
                                 TnFbxCamera::kDefaultCameraFilmOffsetY);
-    // kept: the property is made and stays zero; the offsets are set a second time
+    // kept: the property is created and stays zero; the offsets are set a second time
     if (fbxsdk::FbxProperty::Create(&camera, fbxsdk::FbxDouble2DT, "FilmOffset", "", /*pCheckForDup*/ true).IsValid()) {
         camera.FilmOffsetX.Set(static_cast<double>(x));
         camera.FilmOffsetY.Set(static_cast<double>(y));
@@ -86,7 +86,7 @@ void writeFilmOffset(ChannelWriter& writer, TnFbxCamera& source, Camera& camera)
 
 } // namespace
 
-// kept: look-at, up vector and roll are not written; the camera's rotation says where it looks
+// kept: look-at, up vector and roll are not written; the camera's rotation defines its direction
 bool FbxSdk::setCameraCurveValues(fbxsdk::FbxNode* node, TnFbxCamera* camera) {
     Camera* target = node != nullptr ? node->GetCamera() : nullptr;
     if (target == nullptr || camera == nullptr) {

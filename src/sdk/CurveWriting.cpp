@@ -18,8 +18,8 @@ using detail::succeed;
 
 namespace {
 
-/// What the scene holds of a key: its time, its value, and which attributes it has. A channel whose samples are all
-/// equal has one of them in memory, and as many keys as frames.
+/// The memory of a key in the scene: its time, its value, and the index of its attributes. A channel whose samples are
+/// all equal has one of them in memory, and as many keys as frames.
 constexpr std::uint64_t kKeyBytes = 16;
 
 bool mayAddKeys(const TnFbxTime& range, detail::MemoryAccount& memory) {
@@ -82,7 +82,7 @@ bool FbxSdk::setCurveValues(fbxsdk::FbxAnimCurve* curve, TnFbxChannel* channel, 
     return detail::writeCurve(curve, channel, scale, *mFrameTimes, *mMemory);
 }
 
-/// The layer that is written to; null without a stack or layer.
+/// The layer to write into; null without a stack or layer.
 fbxsdk::FbxAnimLayer* FbxSdk::currentLayer() const {
     return mCurrentAnimStack != nullptr ? mCurrentAnimStack->GetSrcObject<fbxsdk::FbxAnimLayer>(0) : nullptr;
 }
@@ -122,7 +122,7 @@ bool FbxSdk::setNullCurveValues(fbxsdk::FbxNode* node, TnFbxNull* null) {
     case TnFbxNull::kFbxNullLookCross:
         target->Look.Set(fbxsdk::FbxNull::eCross);
         break;
-    default: // a number that is no look: the null keeps the look it has
+    default: // a number that is no look: the null keeps its look
         break;
     }
     target->Size.Set(static_cast<double>(null->getNullSize()));

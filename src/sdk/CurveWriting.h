@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From a channel to a property of the scene: its static value, and one key per sampled frame.
+// Conversion of a channel to a property of the scene: its static value, and one key per sampled frame.
 #pragma once
 
 #include "FbxSdk.h"
@@ -31,7 +31,7 @@ public:
         }
     }
 
-    /// Value and curve of a scalar property; nothing without a channel.
+    /// Value and curve of a scalar property; no effect without a channel.
     void write(fbxsdk::FbxPropertyT<fbxsdk::FbxDouble>& property, TnFbxChannel* channel) {
         if (channel != nullptr) {
             property.Set(static_cast<double>(channel->getValue()));

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From the scene to a file: which writer, which version, and one export.
+// Writing the scene to a file: choice of writer and version, and one export.
 #include "FbxSdk.h"
 
 #include "access/WriterChoice.h"
@@ -52,7 +52,7 @@ bool FbxSdk::saveScene(fbxsdk::FbxManager* manager, fbxsdk::FbxDocument* documen
     exporter->SetFileExportVersion(detail::versionString(version), fbxsdk::FbxSceneRenamer::eNone);
 
     const fbxsdk::FbxIOPluginRegistry& registry = *manager->GetIOPluginRegistry();
-    // kept: with embedded media the native writer, also when text is asked for
+    // kept: with embedded media the native writer, also when ASCII is requested
     const int format =
         embedMedia ? registry.GetNativeWriterFormat() : detail::findWriter(registry, asciiFormat ? "ascii" : "binary");
     if (registry.WriterIsFBX(format)) {

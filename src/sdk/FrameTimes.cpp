@@ -1,14 +1,12 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// When frames are.
 #include "FrameTimes.h"
 
 namespace Tarnell::Fbx {
 
 namespace {
 
-/// Beyond, times are worked out one by one: a range may say more frames than there is memory for.
+/// Longer ranges are computed one by one: a range may state more frames than there is memory for.
 constexpr std::size_t kMostKeptTimes = std::size_t{1} << 16;
 
 } // namespace

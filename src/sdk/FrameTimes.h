@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// When frames are.
+// The times of whole frames.
 #pragma once
 
 #include <fbxsdk.h>
@@ -11,12 +11,12 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// The times of whole frames. Most channels of a scene have the same ones: they are worked out once.
+/// The times of whole frames. Most channels of a scene have the same ones: they are computed once.
 class FrameTimes {
 public:
-    /// Of a channel whose first frame this is, at so many frames per second.
+    /// For a channel that starts at this frame, at that many frames per second.
     void begin(std::int64_t firstFrame, float rate);
-    /// Frames are asked for in order, from the first one on.
+    /// Frames are requested in order, from the first one on.
     fbxsdk::FbxTime at(std::int64_t frame);
 
 private:

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Places in the world, frame by frame: evaluated by the platform, taken apart here.
+// Global transforms, frame by frame: evaluated by the platform, decomposed here.
 #include "GlobalSampler.h"
 
 #include "NodeGeometry.h"
@@ -35,7 +35,7 @@ fbxsdk::FbxAMatrix lightAxisTurn() {
     return turn;
 }
 
-/// Something that animates the property on any layer of any stack.
+/// Whether anything animates the property on any layer of any stack.
 bool hasSources(const fbxsdk::FbxProperty& property) { return property.GetSrcObjectCount() > 0; }
 
 bool isAnimated(const fbxsdk::FbxNode& node) {
@@ -45,15 +45,15 @@ bool isAnimated(const fbxsdk::FbxNode& node) {
 /// Position, rotation in degrees and scale, as the nine channels store them.
 using Placement = std::array<float, 9>;
 
-/// Takes matrices apart. What moves without turning costs little: rotation and scale of the matrix before still hold
-/// when the first three rows do.
+/// Decomposes matrices. A motion without rotation costs little: rotation and scale of the previous matrix are reused
+/// while the first three rows are equal.
 class Decomposition {
 public:
     explicit Decomposition(FbxSdk& sdk) : mSdk(sdk) {}
 
     const Placement& of(const fbxsdk::FbxAMatrix& matrix) {
         const fbxsdk::FbxVector4 t = matrix.GetT();
-        // kept: which decomposition is used hangs on an exactly zero translation; they differ near gimbal lock
+        // kept: an exactly zero translation selects the decomposition; they differ near gimbal lock
         const bool atOrigin = t[0] == 0.0 && t[1] == 0.0 && t[2] == 0.0;
         const auto* elements = static_cast<const double*>(matrix);
         const bool isTurned = !std::equal(mAxes.begin(), mAxes.end(), elements,
@@ -126,7 +126,7 @@ void GlobalSampler::add(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& geometr
     mNodes.push_back({&node, moves ? std::make_unique<MovingNode>(mSdk, node, geometric) : nullptr});
 }
 
-/// What drives a node otherwise than by curves, as constraints do, is not evaluated.
+/// Only animation by curves is evaluated, not other drivers of a node such as constraints.
 GlobalSampler::Ancestry GlobalSampler::ancestryOf(const fbxsdk::FbxNode& node) {
     std::vector<const fbxsdk::FbxNode*> unknown;
     Ancestry ancestry;
@@ -150,7 +150,7 @@ fbxsdk::FbxTime GlobalSampler::timeOf(std::int64_t frame) const {
     return time;
 }
 
-/// Makes the first sample; whether there is room for the others.
+/// Makes the first sample; returns whether there is memory for the others.
 bool GlobalSampler::begin(MovingNode& node, SampleAccount& account) const {
     const Placement& first = node.at(timeOf(mFrames.first));
     for (std::size_t i = 0; i < node.runs.size(); ++i) {
@@ -160,17 +160,17 @@ bool GlobalSampler::begin(MovingNode& node, SampleAccount& account) const {
     if (account.take(mFrames, mRate, /*channelCount*/ 1)) {
         return true;
     }
-    account.take(mFrames, mRate, node.runs.size() - 1); // how many would move is not known: at most
+    account.take(mFrames, mRate, node.runs.size() - 1); // how many will change is not known: at most
     return false;
 }
 
-/// Goes on by some frames; whether there is room for more.
+/// Continues by some frames; returns whether there is memory for more.
 bool GlobalSampler::goOn(MovingNode& node, const std::vector<fbxsdk::FbxTime>& times, SampleAccount& account) const {
     for (const fbxsdk::FbxTime& time : times) {
         const Placement& placement = node.at(time);
         for (std::size_t i = 0; i < placement.size(); ++i) {
             SampleRun& run = node.runs[i];
-            // The first channel that moves is paid for.
+            // The memory of the first channel that changes is reserved already.
             if (run.spreadsWith(placement[i]) && node.spreadCount++ > 0 &&
                 !account.take(mFrames, mRate, /*channelCount*/ 1)) {
                 account.take(mFrames, mRate, placement.size() - node.spreadCount);
@@ -193,7 +193,7 @@ void GlobalSampler::sample(SampleAccount& account) {
         return;
     }
 
-    // What has to be remembered is the transforms of a branch over one portion of the frames.
+    // Only the transforms of a branch over one portion of the frames have to be cached.
     constexpr std::int64_t kMostRemembered = 1 << 15;
     constexpr std::int64_t kMostFrames = 1024;
     const std::int64_t portion = std::clamp<std::int64_t>(kMostRemembered / mDepth, 1, kMostFrames);

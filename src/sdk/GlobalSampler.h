@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Places in the world, frame by frame, of all the nodes of a list together.
+// Global transforms, frame by frame, of all the nodes of a list together.
 #pragma once
 
 #include "SampleAccount.h"
@@ -23,11 +23,11 @@ namespace Tarnell::Fbx::detail {
 /// Position, rotation (degrees) and scale, three channels each.
 using GlobalRuns = std::array<SampleRun, 9>;
 
-/// Evaluates nodes over a range of frames, and hands out their samples in the order in which they were added.
+/// Evaluates nodes over a range of frames, and returns their samples in the order in which they were added.
 ///
 /// The frames are taken in portions, and in each portion node after node: of a branch the platform then needs to
-/// remember the transforms of one portion only, however long the range and however deep the tree. A node that nothing
-/// animates, itself or above it, is evaluated once.
+/// cache the transforms of one portion only, however long the range and however deep the tree. A static node, with
+/// static ancestors, is evaluated once.
 class GlobalSampler {
 public:
     /// The range must not be inverted.
@@ -39,19 +39,19 @@ public:
     /// Parents before their children. `geometric` is multiplied from the right.
     void add(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& geometric);
 
-    /// Makes the samples of every node added. Once the account refuses some nothing more is made; runs are incomplete
+    /// Makes the samples of every node added. Once the account refuses some no more are made; runs are incomplete
     /// then.
     void sample(SampleAccount& account);
 
-    /// The samples of the node that was added next, until the next call; null when that is another one, or none. The
-    /// first sample is there also in an incomplete run.
+    /// The samples of the node that was added next, until the next call; null when the node is another one, or none.
+    /// The first sample exists also in an incomplete run.
     GlobalRuns* take(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& geometric);
 
 private:
     struct MovingNode;
     struct SampledNode {
         fbxsdk::FbxNode* node;
-        std::unique_ptr<MovingNode> moving; // null: one sample says all
+        std::unique_ptr<MovingNode> moving; // null: one sample is enough
     };
     struct Ancestry {
         bool isStill = true;
@@ -67,7 +67,7 @@ private:
     SampleRange mFrames;
     float mRate;
     std::vector<SampledNode> mNodes;
-    std::size_t mNext = 0; // to be handed out
+    std::size_t mNext = 0; // to be returned
     std::unique_ptr<MovingNode> mTaken;
     std::unordered_map<const fbxsdk::FbxNode*, Ancestry> mAncestries;
     int mDepth = 1;

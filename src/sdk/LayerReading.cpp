@@ -18,7 +18,7 @@ CornerValues<fbxsdk::FbxVector4> layerNormals(fbxsdk::FbxLayer& layer) {
     if (mapping == Element::eByControlPoint) {
         return {mapping, ElementValues<fbxsdk::FbxVector4>(*element)};
     }
-    if (mapping == Element::eByPolygonVertex) { // kept: here an index alone leads to a normal
+    if (mapping == Element::eByPolygonVertex) { // kept: here an index alone refers to a normal
         return {mapping, ElementValues<fbxsdk::FbxVector4>::numbered(*element)};
     }
     return {};

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a mesh's layers say about each corner of its polygons. Each class looks everything up once, when it is made, and
-// then answers corner by corner without allocating.
+// The values of a mesh's layers at each corner of its polygons. Each class looks everything up once, on construction,
+// and then returns values corner by corner without allocating.
 #pragma once
 
 #include "access/LayerValues.h"
@@ -14,7 +14,7 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// The values of an element that is mapped by control point or by polygon vertex; nothing of any other.
+/// The values of an element that is mapped by control point or by polygon vertex; none of any other.
 template <class Value>
 class CornerValues {
 public:
@@ -22,7 +22,7 @@ public:
     CornerValues(fbxsdk::FbxLayerElement::EMappingMode mapping, const ElementValues<Value>& values)
         : mByControlPoint(mapping == fbxsdk::FbxLayerElement::eByControlPoint), mValues(values) {}
 
-    /// The array that has a value for each of the first `count` corners, in order, where it is as simple as that; else
+    /// The array that has a value for each of the first `count` corners, in order, where the layout allows that; else
     /// null.
     const fbxsdk::FbxLayerElementArrayTemplate<Value>* inOrder(int count) const {
         return mByControlPoint ? nullptr : mValues.inOrder(count);
@@ -43,7 +43,7 @@ CornerValues<fbxsdk::FbxVector4> layerNormals(fbxsdk::FbxLayer& layer);
 /// The diffuse texture coordinates of a layer.
 CornerValues<fbxsdk::FbxVector2> layerUVs(fbxsdk::FbxLayer& layer);
 
-/// The materials of the node a mesh stands on, as colours: nothing for a missing one, `otherwise` for a material that
+/// The materials of the mesh's node, as colours: none for a missing one, `otherwise` for a material that
 /// has no diffuse colour.
 std::vector<std::optional<Colour>> materialColours(const fbxsdk::FbxMesh& mesh, const Colour& otherwise);
 

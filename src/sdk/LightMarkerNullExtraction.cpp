@@ -23,7 +23,7 @@ namespace {
 using Light = fbxsdk::FbxLight;
 using Marker = fbxsdk::FbxMarker;
 
-/// The colour channels, from red on: three from the property, and an alpha that no property holds.
+/// The colour channels, from red on: three from the property, and an alpha without a property.
 template <class Object, class Channel>
 void readColour(PropertySampler& properties, Object& object, Channel red,
                 const fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property) {
@@ -99,7 +99,7 @@ bool FbxSdk::getNull(TnFbxTime& time, bool global, bool useSampleFPS, float samp
     if (!getTransform(time, global, useSampleFPS, sampleFPS, node, null, geometric)) {
         return false;
     }
-    if (source == nullptr) { // kept: a node that carries nothing is a null
+    if (source == nullptr) { // kept: a node without an attribute is a null
         null.setNullSize(TnFbxNull::kDefaultNullSize);
         null.setNullLookType(TnFbxNull::kFbxNullLookCross);
         return succeed();

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From a light to a node's light attribute: colour, intensity, cone and decay, static and keyed.
+// Conversion of a light to a node's light attribute: colour, intensity, cone and decay, static and keyed.
 #include "CurveWriting.h"
 
 #include "PropertySampling.h"
@@ -65,12 +65,12 @@ void writeDecay(const TnFbxLight& source, Light& light) {
     case TnFbxLight::kFbxLightDecayCubic:
         light.DecayType.Set(Light::eCubic);
         break;
-    default: // a number that is no decay: the light keeps the one it has
+    default: // a number that is no decay: the light keeps its decay
         break;
     }
 }
 
-/// What the types of lights differ in.
+/// The differences between the types of lights.
 bool writeType(ChannelWriter& writer, TnFbxLight& source, Light& light) {
     const TnFbxLight::EFbxLightType type = source.getLightType();
     if (type == TnFbxLight::kFbxLightSpot) {

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Deformed control points: a vertex cache replaces everything, otherwise blend shapes and then skin clusters, which
-// have a file of their own. And the opening and closing of a scene's point caches.
+// have a source of their own. Also the opening and closing of a scene's point caches.
 #include "FbxSdk.h"
 
 #include "BlendShapeWeights.h"
@@ -51,7 +51,7 @@ void closeCache(fbxsdk::FbxVertexCacheDeformer& deformer) {
     }
 }
 
-/// Opens the cache unless an instance has done so already. Why it cannot be used; empty when it can.
+/// Opens the cache unless an instance has done so already. Returns why it cannot be used; empty when it can.
 ///
 /// kept: one that does not open is switched off, and the mesh then reads without it.
 std::string openingFault(fbxsdk::FbxVertexCacheDeformer& deformer) {
@@ -70,18 +70,18 @@ std::string openingFault(fbxsdk::FbxVertexCacheDeformer& deformer) {
     return status.GetErrorString();
 }
 
-/// That of its node, where there is one.
+/// The name of its node, where there is one.
 std::string nameOf(const fbxsdk::FbxGeometry& geometry) {
     const fbxsdk::FbxNode* node = geometry.GetNode(0);
     return node != nullptr ? node->GetName() : geometry.GetName();
 }
 
-/// A mesh that is read without what its cache holds.
+/// Warns of a mesh that is read without its cache.
 void warnOfCache(const std::string& fileName, const fbxsdk::FbxGeometry& geometry, const std::string& reason) {
     detail::warnAbout(fileName, '"' + nameOf(geometry) + "\" is read without its point cache: " + reason);
 }
 
-/// Adds the way from the base to a target, times the weight, to every point that both have.
+/// Adds the offset from the base to a target, times the weight, to every point that both have.
 void addTarget(const fbxsdk::FbxShape& shape, const Point* base, int pointCount, double weight, Point* points) {
     const Point* target = shape.GetControlPoints();
     const int count = target != nullptr ? std::min(pointCount, shape.GetControlPointsCount()) : 0;
@@ -90,9 +90,9 @@ void addTarget(const fbxsdk::FbxShape& shape, const Point* base, int pointCount,
     }
 }
 
-/// Adds what one channel does at a weight.
+/// Adds the effect of one channel at a weight.
 ///
-/// kept: the weight is a percentage and multiplies the whole difference all the same.
+/// kept: the weight is a percentage and still multiplies the whole difference.
 void addChannel(fbxsdk::FbxBlendShapeChannel& channel, double weight, const Point* base, int pointCount,
                 Point* points) {
     const int targetCount = channel.GetTargetShapeCount();
@@ -216,7 +216,7 @@ bool FbxSdk::openClosePointCacheData(fbxsdk::FbxScene* scene, bool open) {
             warnOfCache(mFileName, *geometry, fault);
         }
     }
-    return true; // closing comes after the work, whose failure stays noted
+    return true; // closing follows the work, whose failure stays noted
 }
 
 } // namespace Tarnell::Fbx

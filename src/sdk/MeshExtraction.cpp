@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A mesh at one frame: layout, points, and what its layers say about every corner of its polygons.
+// A mesh at one frame: layout, points, and the values of its layers at every corner of its polygons.
 #include "FbxSdk.h"
 
 #include "LayerReading.h"
@@ -32,10 +32,10 @@ using detail::toFloat;
 
 namespace {
 
-/// What points and normals are multiplied by.
+/// The transform of points and normals.
 struct BakeMatrices {
     fbxsdk::FbxAMatrix points;
-    fbxsdk::FbxAMatrix normals; // the rotation alone
+    fbxsdk::FbxAMatrix normals; // the rotation only
 };
 
 fbxsdk::FbxVector4 vectorAt(const TnFbxTransform& transform, TnFbxTransform::EFbxTransformChannelType firstChannel,
@@ -102,7 +102,7 @@ void forEachCorner(const MeshArrays& arrays, int polygonCount, Visit&& visit) {
     }
 }
 
-/// Elements on their way to an array: it is asked for room once for all of a block.
+/// Appends elements to an array in blocks: memory is reserved once per block.
 template <class Element>
 class Block {
 public:
@@ -116,7 +116,7 @@ private:
     std::size_t mCount = 0;
 };
 
-/// Hands on what `convert` makes of each corner's value, or of the one for corners that have none; whether any has.
+/// Passes on what `convert` makes of each corner's value, or of `missing`; returns whether any corner has a value.
 template <class Element, class Value, class Convert, class HandOn>
 bool convertCorners(const detail::CornerValues<Value>& stored, const Value& missing, int cornerCount, int polygonCount,
                     MeshArrays& arrays, const Convert& convert, const HandOn& handOn) {
@@ -128,7 +128,7 @@ bool convertCorners(const detail::CornerValues<Value>& stored, const Value& miss
         block.add(convert(value));
     };
     bool found = false;
-    if (const auto* const values = stored.inOrder(cornerCount)) { // what most files have
+    if (const auto* const values = stored.inOrder(cornerCount)) { // the case of most files
         for (int i = 0; i < cornerCount; ++i) {
             add(values->GetAt(i));
         }
@@ -144,7 +144,7 @@ bool convertCorners(const detail::CornerValues<Value>& stored, const Value& miss
     return found;
 }
 
-/// The normals of a layer; whether it has any.
+/// The normals of a layer; returns whether it has any.
 bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const fbxsdk::FbxAMatrix* bake,
                  int cornerCount, MeshArrays& arrays) {
     const fbxsdk::FbxVector4 missing(static_cast<double>(TnFbxMesh::kDefaultMeshNX),
@@ -159,7 +159,7 @@ bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const f
         [&arrays](const MeshArrays::Vector* normals, std::size_t count) { arrays.addNormals(normals, count); });
 }
 
-/// The texture coordinates of a layer; whether it has any.
+/// The texture coordinates of a layer; returns whether it has any.
 bool fillUVs(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, int cornerCount, MeshArrays& arrays) {
     using Coordinate = MeshArrays::TextureCoordinate;
     const fbxsdk::FbxVector2 missing(static_cast<double>(TnFbxMesh::kDefaultMeshU),
@@ -175,9 +175,9 @@ bool fillUVs(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, int cornerC
 constexpr detail::Colour kDefaultColour = {TnFbxMesh::kDefaultMeshRed, TnFbxMesh::kDefaultMeshGreen,
                                            TnFbxMesh::kDefaultMeshBlue, TnFbxMesh::kDefaultMeshAlpha};
 
-/// The colours of all layers; whether any has some.
+/// The colours of all layers; returns whether any has some.
 ///
-/// kept: every layer overwrites the ones before it, so the last layer decides, also where it has no colour.
+/// kept: every layer overwrites the ones before it, so the last layer wins, also where it has no colour.
 bool fillColours(fbxsdk::FbxMesh& source, MeshArrays& arrays) {
     const auto materials = detail::materialColours(source, kDefaultColour);
     bool found = false;
@@ -188,7 +188,7 @@ bool fillColours(fbxsdk::FbxMesh& source, MeshArrays& arrays) {
         }
         const detail::LayerColours colours(*layer, materials);
         if (!found && !colours.hasAny()) {
-            continue; // the defaults will do
+            continue; // the defaults are sufficient
         }
         auto* const target = arrays.colours();
         forEachCorner(arrays, source.GetPolygonCount(), [&](const Corner& corner) {
@@ -201,7 +201,7 @@ bool fillColours(fbxsdk::FbxMesh& source, MeshArrays& arrays) {
     return found;
 }
 
-/// All that layers say, in the layout that is filled, too, unless it is that of another node's mesh.
+/// The values of all layers, in the layout that is filled, too, unless it is that of another node's mesh.
 void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, bool isAlike, MeshArrays& arrays,
                  TnFbxMesh& mesh) {
     if (!isAlike) {
@@ -214,7 +214,7 @@ void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, bool i
         uvs = isAlike ? uvs : fillUVs(source, *first, cornerCount, arrays);
     }
     const bool colours = fillColours(source, arrays);
-    // At the end: of a mesh that a damaged layer left partly filled, nothing is valid.
+    // At the end: if a damaged layer leaves the mesh partly filled, nothing is valid.
     mesh.setValidNormals(normals);
     mesh.setValidUVs(uvs);
     mesh.setValidColours(colours);
@@ -242,7 +242,7 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
     detail::noteRepairedCorners(mFileName, *node, *source, *mWarnings);
     MeshArrays arrays(mesh);
     const std::int64_t cornerCount = polygonVertexCount(*source);
-    // What there is no room for is counted only, and makes the call fail.
+    // Without enough memory it is counted only, and makes the call fail.
     const bool isFirst = !isInstance || mInstances->isFirst(instanced);
     if (!mMemory->take(
             isFirst ? MeshArrays::bytesOf(source->GetPolygonCount(), source->GetControlPointsCount(), cornerCount)
@@ -286,7 +286,7 @@ void FbxSdk::setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::Fb
     }
     const int count = source.GetControlPointsCount();
     for (int i = 0; i < count; ++i) {
-        // One by one: of points that still stand in a file there need be no list in memory.
+        // One by one: points that are still in a file need not all be in memory.
         const fbxsdk::FbxVector4 stored =
             isDeformed ? deformed[static_cast<std::size_t>(i)] : source.GetControlPointAt(i);
         const fbxsdk::FbxVector4 point = bake != nullptr ? bake->MultT(stored) : stored;

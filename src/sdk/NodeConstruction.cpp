@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Nodes with a new camera, light, null or mesh, and the two objects that surfaces are made of: textures and materials.
+// Nodes with a new camera, light, null or mesh, and the two objects for surfaces: textures and materials.
 #include "FbxSdk.h"
 
 #include "access/MeshBuilding.h"
@@ -14,13 +14,13 @@ using detail::succeed;
 
 namespace {
 
-/// Notes why nothing is made; always null.
+/// Notes why nothing is created; always null.
 std::nullptr_t none(const char* reason) {
     fail(reason);
     return nullptr;
 }
 
-/// A node in the container, a scene or a manager, that carries the attribute. Null when either could not be made.
+/// A node in the container, a scene or a manager, with the attribute. Null when either could not be created.
 template <class Container>
 fbxsdk::FbxNode* nodeWith(fbxsdk::FbxNodeAttribute* attribute, Container* container, const std::string& name) {
     fbxsdk::FbxNode* node = attribute != nullptr ? fbxsdk::FbxNode::Create(container, name.c_str()) : nullptr;
@@ -32,7 +32,7 @@ fbxsdk::FbxNode* nodeWith(fbxsdk::FbxNodeAttribute* attribute, Container* contai
     return node;
 }
 
-/// Null, or why there is nothing to make a mesh of.
+/// Null, or why no mesh can be created.
 const char* faultOf(const TnFbxMesh& mesh) {
     if (mesh.getNumberOfControlPoints() < 1 || mesh.getNumberOfPolygons() < 1 ||
         mesh.getNumberOfPolygonVertices() < 1) {
@@ -85,7 +85,7 @@ fbxsdk::FbxNode* FbxSdk::createLight(fbxsdk::FbxScene* scene, TnFbxLight::EFbxLi
         case TnFbxLight::kFbxLightSpot:
             light->LightType.Set(fbxsdk::FbxLight::eSpot);
             break;
-        default: // a number that is no type: the light keeps the type it has
+        default: // a number that is no type: the light keeps its type
             break;
         }
         light->CastLight.Set(true);

@@ -1,14 +1,14 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Two matrices of a node that reading and deforming both need.
+// Two matrices of a node for reading and deforming.
 #pragma once
 
 #include <fbxsdk.h>
 
 namespace Tarnell::Fbx::detail {
 
-/// The node's place in the world, without its geometric offset and without following a target.
+/// The node's global matrix, without its geometric offset and without following a target.
 inline fbxsdk::FbxAMatrix globalTransform(fbxsdk::FbxNode& node, const fbxsdk::FbxTime& time) {
     return node.EvaluateGlobalTransform(time, fbxsdk::FbxNode::eSourcePivot, /*pApplyTarget*/ false,
                                         /*pForceEval*/ false);

@@ -80,7 +80,7 @@ bool FbxSdk::animateVertexCacheOnMesh(fbxsdk::FbxNode* meshNode, const TnFbxMesh
         std::cout << "Error opening file for write: " << status.GetErrorString() << std::endl; // kept: hosts show it
         return fail(fileNameOf(*cache) + ": " + status.GetErrorString());
     }
-    detail::writePointSamples(*cache, *mesh, time, form); // kept: only closing says whether it worked
+    detail::writePointSamples(*cache, *mesh, time, form); // kept: only closing reports whether it worked
     return cache->CloseFile(&status) ? succeed() : fail(status.GetErrorString());
 }
 
@@ -97,7 +97,7 @@ void FbxSdk::addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const T
     }
     Cache* cache = pointCacheOf(node);
     const bool isOldThere = cache != nullptr && exists(fileNameOf(*cache));
-    if (pointCacheFault(mesh, time) != nullptr) { // kept: the deformer stays, and names a file that is not there
+    if (pointCacheFault(mesh, time) != nullptr) { // kept: the deformer stays, and names a file that does not exist
         warnings.add(mesh.getName(), isOldThere ? kOldCache : kNoSets);
         return;
     }

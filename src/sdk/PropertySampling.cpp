@@ -15,7 +15,7 @@ using detail::PropertySampler;
 
 namespace {
 
-/// Whether the curve passes a key, whose neighbours have its value, without a slope: only users give one.
+/// Whether the curve passes a key, with equal adjacent values, without a slope: only user tangents give one.
 bool isFlatAt(const fbxsdk::FbxAnimCurve& curve, int key) {
     constexpr int kSlopesOfUsers =
         fbxsdk::FbxAnimCurveDef::eTangentUser | fbxsdk::FbxAnimCurveDef::eTangentGenericBreak;
@@ -23,8 +23,8 @@ bool isFlatAt(const fbxsdk::FbxAnimCurve& curve, int key) {
            (curve.KeyGetTangentMode(key) & kSlopesOfUsers) == 0;
 }
 
-/// Whether every key of a curve has the same value and no slope. Then it has that value everywhere, but for the sign of
-/// a zero.
+/// Whether every key of a curve has the same value and no slope. Then it has that value everywhere, except for the sign
+/// of a zero.
 bool isLevel(const fbxsdk::FbxAnimCurve& curve) {
     const int keyCount = curve.KeyGetCount();
     if (keyCount < 2) {
@@ -112,7 +112,7 @@ bool PropertySampler::isConstant() const {
                        [](const SampledCurve& sampled) { return isLevel(*sampled.curve); });
 }
 
-/// The samples of a range that is none too long for an `int`; false when there is no memory for them.
+/// The samples of a range that fits an `int`; false when there is not enough memory for them.
 bool PropertySampler::sampleFrames(const SampleRange& range) {
     const std::int64_t count = frameCount(range.first, range.last);
     mSamples.begin(static_cast<std::size_t>(count));

@@ -1,10 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From an animated property of the scene to a channel: its static value, and one sample per whole frame.
-//
-// Everything that reads channels goes through a sampler. It looks up once what all properties of a read share (layers,
-// time mode, rate) and keeps its buffers from one property to the next.
+// Conversion of an animated property of the scene to a channel: its static value, and one sample per whole frame.
 #pragma once
 
 #include "FrameTimes.h"
@@ -26,22 +23,22 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Rounds to the nearest float; what is too large becomes infinite, as IEEE 754 has it.
+/// Rounds to the nearest float; a value out of range becomes infinite, as in IEEE 754.
 inline float toFloat(double value) { return static_cast<float>(value); }
 
-/// The channel some places after another one in its enumeration.
+/// The channel that many positions after another one in its enumeration.
 template <class Channel>
 constexpr Channel channelAfter(Channel channel, int offset) {
     return static_cast<Channel>(static_cast<int>(channel) + offset);
 }
 
-/// The number that an enumeration property holds, which in a file can be any.
+/// The number of an enumeration property, which in a file can be any.
 inline int enumNumber(const fbxsdk::FbxProperty& property) { return property.Get<fbxsdk::FbxEnum>(); }
 
 /// The layers of an animation stack, in order; none of a null stack.
 std::vector<fbxsdk::FbxAnimLayer*> layersOf(fbxsdk::FbxAnimStack* stack);
 
-/// The channels of a marker, which hands them out to nobody else.
+/// The channels of a marker, which are not accessible otherwise.
 struct MarkerChannels {
     static TnFbxChannel& of(TnFbxMarker& marker, TnFbxMarker::EFbxMarkerChannelType channel) {
         return marker.mChannels[static_cast<std::size_t>(channel)];
@@ -65,6 +62,8 @@ inline TnFbxChannel& channelOf(TnFbxMarker& object, TnFbxMarker::EFbxMarkerChann
 /// The names under which a vector's components are keyed.
 inline constexpr const char* kComponents[] = {"X", "Y", "Z"};
 
+/// All channels are read through a sampler. It looks up once what all properties of a read share (layers, time mode,
+/// rate) and keeps its buffers from one property to the next.
 class PropertySampler {
 public:
     /// `requested` is the range to cover at least. Key frames are converted to `sampleRate` when `useSampleRate` is set
@@ -82,7 +81,7 @@ public:
     const TnFbxTime& time() const { return mTime; }
     SampleRun& samples() { return mSamples; }
 
-    /// Samples straight into a channel of an object, which keeps what it held when there is nothing to store.
+    /// Samples directly into a channel of an object, which stays unchanged when there is nothing to store.
     template <class Object, class Channel>
     void sampleInto(Object& object, Channel channel, const fbxsdk::FbxProperty& property,
                     const char* component = nullptr) {
@@ -111,7 +110,7 @@ public:
                            const fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property);
 
 private:
-    TimeModeScope mTimeModeScope; // first: the scene's rate is in force while it samples
+    TimeModeScope mTimeModeScope; // first: the scene's rate is set while it samples
 
     void collectCurves(const fbxsdk::FbxProperty& property, const char* component);
     SampleRange keyedRange() const;
@@ -128,7 +127,7 @@ private:
     SampleAccount& mAccount;
     FrameTimes& mFrameTimes;
 
-    /// A curve, and where it was evaluated last: the next sample is not far.
+    /// A curve, and a cursor at its last evaluation: the next sample is close to it.
     struct SampledCurve {
         fbxsdk::FbxAnimCurve* curve;
         int lastKey;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The samples of one call, as part of what it hands out.
+// The samples of one call, as part of the memory of its results.
 #pragma once
 
 #include "SampleRange.h"
@@ -13,22 +13,22 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Asks for the memory of samples before they are made, and knows over which frames they were wanted.
+/// Reserves the memory of samples before they are made, and records the frames that were requested.
 ///
-/// Samples that do not change take none. Whether they do shows only when they are evaluated; so what may move asks for
-/// one channel before the first frame and gives it back if nothing moved. All that is given back in a call is bounded,
-/// too: evaluation takes time where it takes no memory.
+/// Constant samples take none. Whether they are constant is known only after evaluation; so a node that may be animated
+/// reserves one channel before the first frame and returns it if it is constant. The total returned in a call is
+/// bounded, too: evaluation takes time where it takes no memory.
 class SampleAccount {
 public:
     explicit SampleAccount(MemoryAccount& memory) : mMemory(memory) {}
 
-    /// Forgets the frames of the call before.
+    /// Clears the frames of the call before.
     void begin() {
         mFrames = {};
         mGivenBack = 0;
     }
 
-    /// False when the samples of so many channels over the frames go beyond the limit.
+    /// False when the samples of that many channels over the frames exceed the limit.
     bool take(const SampleRange& frames, float rate, std::uint64_t channelCount) {
         mFrames.include(frames.first, frames.last);
         mRate = rate;
@@ -46,7 +46,7 @@ public:
         }
     }
 
-    /// "frames 0 to 239 at 24 frames per second: ", or nothing when no samples were asked for.
+    /// "frames 0 to 239 at 24 frames per second: ", or nothing when no samples were requested.
     std::string describe() const;
 
 private:
@@ -56,7 +56,7 @@ private:
 
     MemoryAccount& mMemory;
     std::uint64_t mGivenBack = 0;
-    SampleRange mFrames; // all that were asked for
+    SampleRange mFrames; // all that were requested
     float mRate = 0.0f;
 };
 

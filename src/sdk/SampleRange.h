@@ -27,7 +27,7 @@ constexpr int convertFrame(int frame, float rate, float sampleRate) {
     return truncateToInt(static_cast<float>(frame) / rate * sampleRate);
 }
 
-/// First and last frame. New ranges hold nothing: any frame lowers the first and raises the last.
+/// First and last frame. New ranges are empty: any frame lowers the first and raises the last.
 struct SampleRange {
     int first = std::numeric_limits<int>::max();
     int last = std::numeric_limits<int>::min();
@@ -44,7 +44,7 @@ struct SampleRange {
     constexpr bool isAnimation() const { return wrappingSubtract(last, first) > 0; }
 };
 
-/// What is said about the samples of a range: their frames and their rate, which for no samples is 0.
+/// The time record of the samples of a range: their frames and their rate, which for no samples is 0.
 inline TnFbxTime sampledTime(const SampleRange& range, float rate) {
     TnFbxTime time;
     time.setTime(0.0f, range.first, range.last, frameCount(range.first, range.last) > 0 ? rate : 0.0f);

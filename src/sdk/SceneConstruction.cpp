@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From value objects to a scene: the global settings that every written file has, and one node below the root per
-// object.
+// Conversion of value objects to a scene: the global settings that every written file has, and one node below the root
+// per object.
 #include "FbxSdk.h"
 
 #include "access/TimeModeScope.h"
@@ -32,12 +32,12 @@ struct TimeModeRow {
     Time::EMode mode;
 };
 
-/// The first row that is near enough counts.
+/// The first row that is close enough is used.
 constexpr TimeModeRow kTimeModes[] = {
     {23.976f, Time::eFilmFullFrame},
     {24.0f, Time::eFrames24},
     {25.0f, Time::ePAL},
-    {29.9700262f, Time::eNTSCDropFrame}, // kept: 29.97 is too far away and custom
+    {29.9700262f, Time::eNTSCDropFrame}, // kept: 29.97 is too far off and custom
     {30.0f, Time::eFrames30},
     {48.0f, Time::eFrames48},
     {50.0f, Time::eFrames50},
@@ -57,7 +57,7 @@ Time::EMode timeModeOf(float framesPerSecond) {
     return Time::eCustom;
 }
 
-/// The range to write; one that nobody set, and one that is none, says nothing about the span.
+/// The range to write; one that is not set, and an invalid one, do not define the span.
 bool saysSpan(const TnFbxWriteInfo& info) {
     const float first = info.getStartFrame(), last = info.getEndFrame(), rate = info.getFPS();
     const bool isDefault = first == TnFbxWriteInfo::kDefaultStartFrame && last == TnFbxWriteInfo::kDefaultEndFrame;
@@ -72,7 +72,7 @@ TnFbxTime timeOf(const TnFbxWriteInfo& info) {
     return time;
 }
 
-/// The keys of one scene, held against `memoryLimit()`.
+/// The keys of one scene, checked against `memoryLimit()`.
 class KeyScope {
 public:
     explicit KeyScope(detail::MemoryAccount& memory) : mMemory(memory) { mMemory.begin(); }
@@ -84,12 +84,12 @@ private:
     detail::MemoryAccount& mMemory;
 };
 
-/// Adds nodes to the root, and gathers what is to be said of all of them.
+/// Adds nodes to the root, and collects the warnings about all of them.
 class SceneBuilder {
 public:
     SceneBuilder(fbxsdk::FbxNode& root, fbxsdk::FbxAnimStack* stack) : mRoot(root), mStack(stack) {}
 
-    /// Adds what `makeNode` makes of each object that is one. Its null leaves the object out.
+    /// Adds the result of `makeNode` for each valid object. Null omits the object.
     template <class Object, class MakeNode>
     void addNodes(const std::vector<Object*>& objects, MakeNode makeNode) {
         for (Object* object : objects) {
@@ -112,7 +112,7 @@ public:
         }
     }
 
-    /// States the span of time, and says what was noticed.
+    /// States the span of time, and reports the warnings.
     void finish(const TnFbxWriteInfo& info, fbxsdk::FbxScene& scene) {
         if (saysSpan(info)) {
             const TnFbxTime range = timeOf(info);
@@ -144,7 +144,7 @@ bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCame
         return fail("the FBX manager is not initialised");
     }
     initCreateAnimationStack();
-    // kept: the stack just made is "Take 001"; another name selects nothing and changes nothing
+    // kept: the new stack is "Take 001"; another name selects nothing and changes nothing
     createScene(mManager, mScene, info.getFPS(), info.getAnimationStackName());
     fbxsdk::FbxNode* root = mScene->GetRootNode();
     if (root == nullptr) {
@@ -153,7 +153,7 @@ bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCame
 
     const KeyScope keys(*mMemory);
     SceneBuilder builder(*root, mCurrentAnimStack);
-    // kept: cameras and lights are made in the scene, everything else by the manager
+    // kept: cameras and lights are created in the scene, everything else by the manager
     if (info.getWriteCameras()) {
         builder.addNodes(cameras, [this](TnFbxCamera& camera) {
             fbxsdk::FbxNode* node = createCamera(mScene, camera.getName());
@@ -242,7 +242,7 @@ bool FbxSdk::setGlobalTimeSettings(fbxsdk::FbxScene* scene, float framesPerSecon
     if (scene == nullptr) {
         return fail("no scene for the global time settings");
     }
-    const detail::TimeModeScope timeMode; // the scene's settings would leave theirs
+    const detail::TimeModeScope timeMode; // the scene's settings would set theirs
     scene->GetGlobalSettings().SetTimeMode(timeModeOf(framesPerSecond));
     return succeed();
 }

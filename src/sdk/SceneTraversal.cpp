@@ -1,9 +1,9 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Counting, naming and listing: the walks over the node tree.
+// Counting, naming and listing: the traversals of the node tree.
 //
-// The six kinds of objects differ by a row: which nodes they are, and what reads one. Everything else is one walk.
+// The six kinds of objects differ by a row: which nodes they are, and which function reads one. The rest is common.
 #include "FbxSdk.h"
 
 #include "GlobalSampler.h"
@@ -32,7 +32,7 @@ namespace {
 
 using Attribute = fbxsdk::FbxNodeAttribute;
 
-// ---- What a node is: one bit per attribute type, and one for nodes that have none ----
+// ---- The kind of a node: one bit per attribute type, and one for nodes without any ----
 
 constexpr std::uint32_t bitOf(int attributeType) {
     return attributeType >= 0 && attributeType < 31 ? std::uint32_t{1} << attributeType : 0;
@@ -44,7 +44,7 @@ std::uint32_t typeBit(fbxsdk::FbxNode& node) {
     return attribute != nullptr ? bitOf(attribute->GetAttributeType()) : kNoAttribute;
 }
 
-/// What the bits of the public mask select. 0x400 selects nothing, and nothing selects stereo cameras.
+/// The attribute types of the bits of the public mask. 0x400 selects nothing, and no bit selects stereo cameras.
 struct MaskRow {
     long maskBit;
     std::uint32_t types;
@@ -91,7 +91,7 @@ constexpr ProducerRow kProducers[] = {
     {&fbxsdk::FbxGlobalCameraSettings::GetCameraProducerLeft, "Producer Left"},
 };
 
-/// Makes the producer cameras unless the scene has one of them already, and hands out its settings.
+/// Creates the producer cameras unless the scene has one of them already, and returns its settings.
 fbxsdk::FbxGlobalCameraSettings& ensureProducers(fbxsdk::FbxScene& scene) {
     fbxsdk::FbxGlobalCameraSettings& settings = scene.GlobalCameraSettings();
     if (std::none_of(std::begin(kProducers), std::end(kProducers),
@@ -116,7 +116,7 @@ struct ReadFlags {
 template <class Object>
 struct Kind {
     std::uint32_t types;
-    bool geometricOffset; // whether the node's geometric transform takes part
+    bool geometricOffset; // whether the node's geometric transform is used
     bool (*read)(FbxSdk& sdk, TnFbxTime& time, const ReadFlags& flags, fbxsdk::FbxNode& node, Object& object,
                  fbxsdk::FbxAMatrix& geometric);
 };
@@ -169,7 +169,7 @@ constexpr std::uint32_t kCountedOnly<TnFbxNull> = bitOf(Attribute::eNurbsSurface
 template <>
 constexpr std::uint32_t kCountedOnly<TnFbxTransform> = bitOf(Attribute::eNurbsSurface);
 
-/// Says how many elements of the array stay as they were made, for want of a reader of surfaces; of one name or of all.
+/// Warns of elements that stay in their initial state, since surfaces have no reader; of one name or of all.
 void warnOfSurfaces(const std::string& fileName, fbxsdk::FbxScene& scene, std::uint32_t types,
                     const std::string* objectName) {
     int count = 0;
@@ -190,7 +190,7 @@ void warnOfSurfaces(const std::string& fileName, fbxsdk::FbxScene& scene, std::u
     }
 }
 
-/// The state of one walk: what to read and where to put it.
+/// The state of one traversal: what to read and where to store it.
 template <class Object>
 struct Walk {
     using ObjectType = Object;
@@ -202,7 +202,7 @@ struct Walk {
     Object* objects;
     int capacity;
     int& index;  // the next free element
-    bool& found; // the object asked for by name was read
+    bool& found; // the requested object was read
 };
 
 template <class Object>
@@ -216,7 +216,7 @@ void readNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node, Obje
     kKind<Object>.read(sdk, walk.time, walk.flags, node, object, geometric); // the object keeps what a failure left
 }
 
-/// Reads the node if it is of the kind and asked for. False when the array has no room for it.
+/// Reads the node if it is of the kind and requested. False when the array has no element left for it.
 template <class Object>
 bool visitNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node) {
     if ((typeBit(node) & kKind<Object>.types) == 0) {
@@ -239,7 +239,7 @@ bool visitNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node) {
 template <class Object>
 constexpr bool kIsPlacedInWorld = !std::is_same_v<Object, TnFbxCamera>;
 
-/// The sampler of everything that a walk will read in the world; null when that is nothing.
+/// The sampler of everything that a traversal will read in the world; null when that is nothing.
 template <class Object>
 std::unique_ptr<detail::GlobalSampler> globalsOf(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode* top) {
     if (!kIsPlacedInWorld<Object> || !walk.flags.globalTransform ||
@@ -259,7 +259,7 @@ std::unique_ptr<detail::GlobalSampler> globalsOf(FbxSdk& sdk, const Walk<Object>
     return globals;
 }
 
-/// Puts a value in place until the scope ends, whichever way it does.
+/// Sets a value until the scope ends, also by an exception.
 template <class Value>
 class Temporarily {
 public:
@@ -274,7 +274,7 @@ private:
 
 } // namespace
 
-/// A node and what is below it, as far as there is room and until the object asked for was found.
+/// A node and its descendants, until the array is full or the requested object was found.
 template <class Walk>
 bool FbxSdk::walkSubtree(const Walk& walk, fbxsdk::FbxNode* top) {
     if (walk.objects == nullptr) {

@@ -34,7 +34,7 @@ namespace {
 
 constexpr char kDefaultLayerName[] = "Default Layer";
 
-/// What an import is meant to bring in.
+/// What an import is meant to read.
 constexpr const char* kImportSettings[] = {
     "Import|AdvOptGrp|FileFormat|Fbx|Material",        //
     "Import|AdvOptGrp|FileFormat|Fbx|Texture",         //
@@ -60,8 +60,8 @@ fbxsdk::FbxAnimStack* stackAt(fbxsdk::FbxScene& scene, int index) {
     return fbxsdk::FbxCast<fbxsdk::FbxAnimStack>(scene.GetSrcObject(isStack(), index));
 }
 
-/// What the platform evaluates follows the stack, too. Whoever sets it is remembered in the scene's file, so it is set
-/// only where it is another one.
+/// The platform evaluates the same stack. The stack that is set is recorded in the scene's file, so it is set
+/// only when it changes.
 void evaluateStack(fbxsdk::FbxScene& scene, fbxsdk::FbxAnimStack* stack) {
     if (scene.GetCurrentAnimationStack() != stack) {
         scene.SetCurrentAnimationStack(stack);
@@ -91,7 +91,7 @@ FbxSdk& FbxSdk::operator=(const FbxSdk& other) {
 
 bool FbxSdk::initFbxSdkManager() {
     if (!mInitialized) {
-        destroySdkObjects(&mManager); // of an attempt that ended half-way
+        destroySdkObjects(&mManager); // of an attempt that failed half-way
         if (!initializeSdkObjects(&mManager, &mScene)) {
             return false;
         }
@@ -105,11 +105,11 @@ bool FbxSdk::destroyFbxSdkManager() {
         return fail("there is no FBX manager to destroy");
     }
     destroySdkObjects(&mManager);
-    mScene = nullptr; // both died with the manager
+    mScene = nullptr; // both were destroyed with the manager
     mFileName.clear();
     mCurrentAnimStack = nullptr;
     mInitialized = false;
-    return true; // the reason of a failure that led here stays
+    return true; // the reason of the failure that led here stays
 }
 
 bool FbxSdk::initializeSdkObjects(fbxsdk::FbxManager** manager, fbxsdk::FbxScene** scene) {

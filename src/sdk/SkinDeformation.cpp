@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the clusters of a mesh's skins do to its points, block by block of points, so that the sums of a block stay in
-// the cache until they are applied. The link mode says how a point's influences add up.
+// The effect of a mesh's skin clusters on its points, block by block of points, so that the sums of a block stay in
+// the cache until they are applied. The link mode determines how a point's influences add up.
 #include "FbxSdk.h"
 
 #include "NodeGeometry.h"
@@ -29,7 +29,7 @@ constexpr int kMatrixElements = 16;
 /// Weights are compared in double precision with a threshold of single precision.
 constexpr double kWeightThreshold = static_cast<double>(1e-5f);
 
-/// The sums of so many points stay in a core's own cache, and each cluster has enough influences among them for one go.
+/// The sums of this many points stay in a core's own cache, and each cluster has enough influences for one pass.
 constexpr std::size_t kBlockPoints = 1024;
 
 void scaleElements(Matrix& matrix, double factor) {
@@ -53,14 +53,14 @@ void addToDiagonal(Matrix& matrix, double value) {
     }
 }
 
-/// The mode of the mesh's first cluster holds for all of them.
+/// The mode of the mesh's first cluster applies to all of them.
 Cluster::ELinkMode linkModeOf(const fbxsdk::FbxMesh& mesh) {
     auto* skin = fbxsdk::FbxCast<fbxsdk::FbxSkin>(mesh.GetDeformer(0, fbxsdk::FbxDeformer::eSkin));
     const Cluster* first = skin != nullptr && skin->GetClusterCount() > 0 ? skin->GetCluster(0) : nullptr;
     return first != nullptr ? first->GetLinkMode() : Cluster::eNormalize;
 }
 
-/// From a point of the mesh at rest to where a cluster's link takes it.
+/// From a point of the mesh at rest to where a cluster's link moves it.
 Matrix vertexTransform(FbxSdk& sdk, const Matrix& globalPosition, fbxsdk::FbxMesh& mesh, Cluster& cluster,
                        fbxsdk::FbxNode& link, Cluster::ELinkMode mode, const fbxsdk::FbxTime& time) {
     Matrix referenceInit, referenceCurrent, linkInit;
@@ -115,7 +115,7 @@ public:
         mWeight += weight;
     }
 
-    /// kept: a total of exactly the threshold leaves the point alone, while a weight of exactly the threshold counts
+    /// kept: a total of exactly the threshold leaves the point unchanged, a weight of exactly the threshold counts
     void apply(Cluster::ELinkMode mode, Point& point) const {
         if (!(std::fabs(mWeight) > kWeightThreshold)) {
             return;
@@ -134,7 +134,7 @@ private:
     double mWeight = 0.0;
 };
 
-/// The influences of one point in the additive mode, where each one moves what the ones before it have moved.
+/// The influences of one point in the additive mode, where each one moves the point as moved by those before it.
 class ChainedSum {
 public:
     using Motion = Matrix;
@@ -171,18 +171,18 @@ struct Influences {
         : motion(transform), indices(cluster.GetControlPointIndices()), weights(cluster.GetControlPointWeights()),
           count(indices != nullptr && weights != nullptr ? cluster.GetControlPointIndicesCount() : 0) {}
 
-    /// Counts the descents, which takes vectors of indices at a time, rather than to look for the first one.
+    /// Counts the descents, which is vectorised, rather than to look for the first one.
     [[nodiscard]] bool isAscending() const {
         return count < 2 ||
                std::inner_product(indices + 1, indices + count, indices, 0, std::plus<>(), std::less<>()) == 0;
     }
 
-    /// Adds those to the next index above `lastIndex`. Indices that are outside of the block are passed over.
+    /// Adds those to the next index above `lastIndex`. Indices outside of the block are skipped.
     void addUpTo(int lastIndex, std::size_t firstPoint, std::vector<Sum>& sums) {
-        const typename Sum::Motion moved = motion; // nothing else sees it: it can stay in registers
+        const typename Sum::Motion moved = motion; // a local copy, so that it can stay in registers
         for (; next < count && indices[next] <= lastIndex; ++next) {
             const double weight = weights[next];
-            // a negative index becomes a huge one
+            // a negative index becomes a large one
             const std::size_t point = static_cast<std::size_t>(indices[next]) - firstPoint;
             if (!(std::fabs(weight) < kWeightThreshold) && point < sums.size()) {
                 sums[point].add(moved, weight);
@@ -195,8 +195,8 @@ struct Influences {
 /// makes the result the same for every size of a block.
 template <class Sum>
 void deform(std::vector<Influences<Sum>>& clusters, Cluster::ELinkMode mode, std::size_t pointCount, Point* points) {
-    // Lists in the order of their points, as they mostly are, come by in one go through all blocks. Others would have
-    // to be searched for every block: the whole mesh is one then.
+    // Ascending lists, the usual case, are processed in one pass through all blocks. Others would have
+    // to be searched for every block: the whole mesh is one block then.
     const bool ascending =
         std::all_of(clusters.begin(), clusters.end(), [](const auto& cluster) { return cluster.isAscending(); });
     const std::size_t blockSize = ascending ? kBlockPoints : pointCount;

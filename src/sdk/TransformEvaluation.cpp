@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A node's transform: its local channels as they are keyed, or its place in the world, evaluated and decomposed frame
+// A node's transform: its local channels as they are keyed, or its global transform, evaluated and decomposed frame
 // by frame; and the two numberings of rotation orders.
 #include "FbxSdk.h"
 
@@ -52,7 +52,7 @@ EulerAngles eulerFromMatrix(const fbxsdk::FbxAMatrix& matrix) {
         return {std::fabs(s + 1.0f) < kGimbalTolerance ? kHalfPi : -kHalfPi, 0.0f, std::atan2(-m(1, 0), m(0, 0))};
     }
     const float h = std::sqrt(m(2, 2) * m(2, 2) + m(2, 0) * m(2, 0));
-    // kept: a vanishing h is its own factor; atan2 does not mind as long as the factor is positive
+    // kept: a vanishing h is its own factor; the result of atan2 is the same as long as the factor is positive
     const float k = std::fabs(h) > kGimbalTolerance ? 1.0f / h : h;
     return {std::atan2(-s, h), std::atan2(m(2, 0) * k, m(2, 2) * k), std::atan2(m(0, 1) * k, m(1, 1) * k)};
 }
@@ -77,7 +77,7 @@ bool FbxSdk::getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float
     return scope.finish(succeed());
 }
 
-/// The samples in the world, which a list has made of all its nodes together, and a single node makes now.
+/// The samples in the world: made by a list for all of its nodes together, and by a single node now.
 void FbxSdk::storeGlobalTransform(const TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxAMatrix& geometric,
                                   TnFbxTransform& transform) {
     detail::GlobalRuns* runs = mGlobals != nullptr ? mGlobals->take(node, geometric) : nullptr;

@@ -26,14 +26,15 @@ public:
     [[nodiscard]] FbxVector4 GetColumn(int pX) const;                   ///< 0 to 3; not checked.
 
     [[nodiscard]] FbxVector4 GetT() const; ///< The translation.
-    /// Euler angles of the axes made unit length. At a pitch of ±90° the turn is all given to x, and z is 0.
+    /// Euler angles of the axes scaled to unit length. At a pitch of ±90° all of the rotation is assigned to x, and z
+    /// is 0.
     ///
-    /// An axis scaled to zero is taken perpendicular to the others; when two or three are gone, what cannot be known
-    /// follows the coordinate axes. The result is never NaN for a finite matrix.
+    /// An axis scaled to zero is taken perpendicular to the others; when two or three are zero, the undetermined ones
+    /// follow the coordinate axes. The result is never NaN for a finite matrix.
     [[nodiscard]] FbxVector4 GetR() const;
     /// Lengths of the axes; all three negative when the matrix mirrors.
     [[nodiscard]] FbxVector4 GetS() const;
-    [[nodiscard]] FbxQuaternion GetQ() const; ///< The same rotation as GetR, of length 1.
+    [[nodiscard]] FbxQuaternion GetQ() const; ///< The same rotation as GetR, as a unit quaternion.
 
     void SetIdentity(); ///< No translation, no rotation, scale 1.
     /// Replaces the translation and keeps rotation and scale.
@@ -41,7 +42,7 @@ public:
     void SetR(const FbxVector4& pR);    ///< Replaces the rotation by Euler angles and keeps the other two.
     void SetS(const FbxVector4& pS);    ///< Replaces the scale and keeps the other two; shear is lost.
     void SetQ(const FbxQuaternion& pQ); ///< Replaces the rotation and keeps the other two.
-    /// Replaces everything: scales first, then turns, then moves.
+    /// Replaces everything: scales first, then rotates, then translates.
     void SetTRS(const FbxVector4& pT, const FbxVector4& pR, const FbxVector4& pS);
     /// The same with the rotation as a quaternion.
     void SetTQS(const FbxVector4& pT, const FbxQuaternion& pQ, const FbxVector4& pS);
@@ -68,8 +69,8 @@ public:
     /// The inverse of the affine part; the identity when there is none.
     [[nodiscard]] FbxAMatrix Inverse() const;
     [[nodiscard]] FbxAMatrix Transpose() const; ///< Rows become columns; with a translation the result is not affine.
-    /// Between this matrix (weight 0) and the other one (weight 1): rotation on the shorter way at constant speed,
-    /// translation and scale in a straight line.
+    /// Interpolates from this matrix (weight 0) to the other one (weight 1): rotation on the shorter arc at constant
+    /// speed, translation and scale linearly.
     [[nodiscard]] FbxAMatrix Slerp(const FbxAMatrix& pOther, double pWeight) const;
 
     /// Equal when no element differs by more than FBXSDK_TOLERANCE.

@@ -13,15 +13,15 @@ FBXSDK_NAMESPACE_BEGIN
 class FbxAnimCurve;
 class FbxTimeSpan;
 
-/// What joins curves and one property on one layer: a channel for each component, with a value of its own and the
-/// curves that drive it. It is a source of the property and a member of the layer; a property has one at most per
+/// Joins curves and one property on one layer: a channel for each component, with a value of its own and the
+/// curves that drive it. It is a source of the property and a member of the layer; a property has at most one per
 /// layer.
 class FBXSDK_DLL FbxAnimCurveNode : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxAnimCurveNode, FbxObject)
 
 public:
     /// A curve node with the channels that the property's type has: X, Y, Z for three numbers, one of the property's
-    /// name for a single one; their values are the property's. Not connected yet. It is made in the scene, or in the
+    /// name for a single one; their values are the property's. Not connected yet. It is created in the scene, or in the
     /// manager when that is null. Null for an invalid property and one without numbers.
     static FbxAnimCurveNode* CreateTypedCurveNode(FbxProperty& pProperty, FbxScene* pScene);
 
@@ -45,26 +45,27 @@ public:
     /// The channel's curve of that number; the first one counts in evaluation. Null where GetCurveCount has none.
     [[nodiscard]] FbxAnimCurve* GetCurve(unsigned int pChannelId, unsigned int pId = 0,
                                          const char* pCurveNodeName = nullptr) const;
-    /// Makes a curve of that name in the curve node's scene, or manager, as the channel's last one; null out of range.
+    /// Creates a curve of that name in the curve node's scene, or manager, as the channel's last one; null out of
+    /// range.
     FbxAnimCurve* CreateCurve(const char* pCurveNodeName, unsigned int pChannelId = 0U);
     /// The same for the channel of that name; null when it is unknown.
     FbxAnimCurve* CreateCurve(const char* pCurveNodeName, const char* pChannelName);
-    /// Makes the curve drive the channel, behind or before those that do. False for null, out of range and when it does
+    /// Makes the curve drive the channel, after those that do. False for null, out of range and when it does
     /// already.
     bool ConnectToChannel(FbxAnimCurve* pCurve, unsigned int pChannelId, bool pInFront = false);
     /// The same for the channel of that name; false when it is unknown.
     bool ConnectToChannel(FbxAnimCurve* pCurve, const char* pChannelName, bool pInFront = false);
-    /// The curve lives on. False out of range and when the curve does not drive the channel.
+    /// The curve is not destroyed. False out of range and when the curve does not drive the channel.
     bool DisconnectFromChannel(FbxAnimCurve* pCurve, unsigned int pChannelId);
-    /// True when any channel has a curve with keys. The argument makes no difference.
+    /// True when any channel has a curve with keys. The argument has no effect.
     [[nodiscard]] bool IsAnimated(bool pRecurse = false) const;
-    /// Widens nothing: sets the span to that of all keys. False when there are none.
+    /// Sets the span to that of all keys, whatever it was. False when there are none.
     bool GetAnimationInterval(FbxTimeSpan& pTimeInterval) const;
 
     /// Adds a channel; false when the name is taken.
     bool addChannel(const char* pName, double pValue);
     /// Brings the channels into the order of a vector's components, whatever order a file had them in; those that are
-    /// missing are made with the component's value.
+    /// missing are created with the component's value.
     void arrangeChannels(const std::vector<double>& pComponents);
     [[nodiscard]] double channelValue(unsigned int pChannelId) const; ///< 0 out of range.
     void setChannelValue(unsigned int pChannelId, double pValue);     ///< No effect out of range.
@@ -72,7 +73,7 @@ public:
     [[nodiscard]] int usesOf(const FbxAnimCurve& pCurve) const;
 
 protected:
-    /// Takes a curve that is cut off out of its channels.
+    /// Removes a disconnected curve from its channels.
     FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
@@ -82,7 +83,7 @@ private:
         std::vector<FbxAnimCurve*> curves;
     };
     std::vector<Channel> mChannels;
-    /// Index by name, once there are many and until their order changes.
+    /// Index by name, built once there are many channels and until their order changes.
     mutable std::unordered_map<std::string, int> mChannelIndex;
     std::unordered_map<const FbxObject*, int> mUses; ///< of each curve, how many channels it drives
 };

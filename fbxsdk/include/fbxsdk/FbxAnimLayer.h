@@ -14,7 +14,7 @@ class FBXSDK_DLL FbxAnimLayer : public FbxCollection {
     FBXSDK_OBJECT_DECLARE(FbxAnimLayer, FbxCollection)
 
 public:
-    /// How the layer's values meet those below.
+    /// How the layer's values combine with those below.
     enum EBlendMode {
         eBlendAdditive,           ///< they are added, by weight
         eBlendOverride,           ///< they replace them, whatever the weight
@@ -32,8 +32,8 @@ public:
     };
 
     FbxPropertyT<FbxDouble> Weight;  ///< percent, 0 to 100; 100, animatable. Of no effect on the base layer
-    FbxPropertyT<FbxBool> Mute,      ///< true: the layer does not count
-        Solo,                        ///< true: only layers with it count
+    FbxPropertyT<FbxBool> Mute,      ///< true: the layer is ignored
+        Solo,                        ///< true: only layers with this flag are used
         Lock;                        ///< true: applications do not edit the layer
     FbxPropertyT<FbxDouble3> Color;  ///< for display, 0 to 1; (0.8, 0.8, 0.8)
     FbxPropertyT<FbxEnum> BlendMode, ///< EBlendMode; eBlendAdditive
@@ -41,11 +41,11 @@ public:
         ScaleAccumulationMode;       ///< EScaleAccumulationMode; eScaleMultiply
 
     void Reset(); ///< Sets all of these and the bypasses to their defaults; curves stay.
-    /// With the bypass on, values of that type override instead of blending. Types that are none are ignored.
+    /// With the bypass on, values of that type override instead of blending. Numbers that are no type are ignored.
     void SetBlendModeBypass(EFbxType pType, bool pState);
-    [[nodiscard]] bool GetBlendModeBypass(EFbxType pType) const; ///< False by default and for types that are none.
+    [[nodiscard]] bool GetBlendModeBypass(EFbxType pType) const; ///< False by default and for numbers that are no type.
 
-    /// The layer's curve node for the property, made when there is none, also when the property is not marked as
+    /// The layer's curve node for the property, created when there is none, also when the property is not marked as
     /// animatable; null for an invalid property and one that holds no number.
     FbxAnimCurveNode* CreateCurveNode(FbxProperty& pProperty);
 };

@@ -6,8 +6,8 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// One animation of the scene (a take): a collection of layers, the base layer first. A new stack has none; nothing is
-/// animated until it has one.
+/// One animation of the scene (a take): a collection of layers, the base layer first. A new stack has no layer; nothing
+/// is animated until it has one.
 class FBXSDK_DLL FbxAnimStack : public FbxCollection {
     FBXSDK_OBJECT_DECLARE(FbxAnimStack, FbxCollection)
 

@@ -8,14 +8,14 @@
 #include <cstdint>
 
 #if defined(FBXSDK_BUILDING)
-/// Marks what the shared library exports; of a class that is every member function without another mark.
+/// Marks what the shared library exports; on a class, every member function without another mark.
 #define FBXSDK_DLL __attribute__((visibility("default")))
-/// Marks a private or protected member function of an exported class that the shared library keeps to itself.
+/// Marks a private or protected member function of an exported class that the shared library does not export.
 #define FBXSDK_LOCAL __attribute__((visibility("hidden")))
 #else
-/// Marks what the shared library exports; of a class that is every member function without another mark.
+/// Marks what the shared library exports; on a class, every member function without another mark.
 #define FBXSDK_DLL
-/// Marks a private or protected member function of an exported class that the shared library keeps to itself.
+/// Marks a private or protected member function of an exported class that the shared library does not export.
 #define FBXSDK_LOCAL
 #endif
 
@@ -26,11 +26,11 @@
 /// The platform: our own implementation of the documented API, in the inline namespace `tarnell`.
 
 /// The platform's classes are in an inline namespace: the sources read `fbxsdk::FbxNode` as documented, while the
-/// symbols can never mix with those of another SDK that the same host has loaded.
+/// symbols never collide with those of another SDK that the same host has loaded.
 #define FBXSDK_NAMESPACE_BEGIN                                                                                         \
     namespace fbxsdk {                                                                                                 \
     inline namespace tarnell {
-/// Ends what FBXSDK_NAMESPACE_BEGIN began.
+/// Closes what FBXSDK_NAMESPACE_BEGIN opened.
 #define FBXSDK_NAMESPACE_END                                                                                           \
     }                                                                                                                  \
     }

@@ -12,7 +12,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A growing array with the API's `int` indices. Indices of elements are checked by assertions alone. References to
+/// A growing array with the API's `int` indices. Element indices are checked by assertions only. References to
 /// elements are valid until the count grows.
 template <typename T>
 class FbxArray {
@@ -20,7 +20,7 @@ class FbxArray {
 
 public:
     FbxArray() = default; ///< No elements.
-    /// Room for that many elements; the array is empty.
+    /// Capacity for that many elements; the array is empty.
     explicit FbxArray(int pCapacity) { Reserve(pCapacity); }
 
     [[nodiscard]] int GetCount() const { return static_cast<int>(mItems.size()); } ///< How many elements there are.
@@ -30,9 +30,9 @@ public:
     const T& operator[](int pIndex) const { return mItems[checked(pIndex)]; }   ///< The element must exist.
     [[nodiscard]] T GetAt(int pIndex) const { return mItems[checked(pIndex)]; } ///< A copy; the element must exist.
     void SetAt(int pIndex, const T& pElement) { mItems[checked(pIndex)] = pElement; } ///< The element must exist.
-    [[nodiscard]] T GetFirst() const { return GetAt(0); }                             ///< There must be one.
-    [[nodiscard]] T GetLast() const { return GetAt(GetCount() - 1); }                 ///< There must be one.
-    [[nodiscard]] T* GetArray() { return mItems.data(); } ///< All elements in a row; valid until the count grows.
+    [[nodiscard]] T GetFirst() const { return GetAt(0); }                             ///< The array must not be empty.
+    [[nodiscard]] T GetLast() const { return GetAt(GetCount() - 1); }                 ///< The array must not be empty.
+    [[nodiscard]] T* GetArray() { return mItems.data(); } ///< All elements, contiguous; valid until the count grows.
     [[nodiscard]] const T* GetArray() const { return mItems.data(); } ///< The same for reading.
 
     /// The index of the first equal element at or after the start; -1 when there is none.
@@ -49,7 +49,7 @@ public:
         mItems.push_back(pElement);
         return GetCount() - 1;
     }
-    /// Appends the element unless an equal one is there; its index in both cases.
+    /// Appends the element unless an equal one exists; its index in both cases.
     int AddUnique(const T& pElement) {
         const int found = Find(pElement);
         return found >= 0 ? found : Add(pElement);
@@ -63,16 +63,16 @@ public:
         mItems.insert(mItems.begin() + index, pElement);
         return index;
     }
-    /// Takes the element out and returns it; it must exist.
+    /// Removes the element and returns it; it must exist.
     T RemoveAt(int pIndex) {
         const T removed = GetAt(pIndex);
         mItems.erase(mItems.begin() + pIndex);
         return removed;
     }
-    /// Takes the last element out and returns it; there must be one.
+    /// Removes the last element and returns it; the array must not be empty.
     T RemoveLast() { return RemoveAt(GetCount() - 1); }
 
-    /// Makes room, so that so many elements can be added without moving; the count stays. Negative counts as 0.
+    /// Reserves capacity for that many more elements without reallocation; the count stays. Negative counts as 0.
     void Reserve(int pCapacity) { mItems.reserve(static_cast<size_t>(std::max(pCapacity, 0))); }
     /// New elements are value-initialised. Negative counts as 0.
     void Resize(int pCount) { mItems.resize(static_cast<size_t>(std::max(pCount, 0))); }

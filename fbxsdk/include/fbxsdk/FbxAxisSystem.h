@@ -9,7 +9,7 @@ FBXSDK_NAMESPACE_BEGIN
 class FbxNode;
 class FbxScene;
 
-/// Which axis is up, which is front, and of which hand the system is; and the conversion of scenes between systems.
+/// The up axis, the front axis and the handedness of a coordinate system; and the conversion of scenes between systems.
 class FBXSDK_DLL FbxAxisSystem {
 public:
     /// The axis that points up; negative for down.
@@ -18,13 +18,13 @@ public:
         eYAxis = 2, ///< Y
         eZAxis = 3  ///< Z
     };
-    /// Of the two axes beside the up axis, in the order X, Y, Z: the first is even, the second odd. The front points at
-    /// the viewer. Negative for the opposite direction.
+    /// Of the two axes other than the up axis, in the order X, Y, Z: the first is even, the second odd. The front
+    /// points at the viewer. Negative for the opposite direction.
     enum EFrontVector : int {
         eParityEven = 1, ///< the first of the two
         eParityOdd = 2   ///< the second of the two
     };
-    /// Of which hand the system is.
+    /// The handedness of the system.
     enum ECoordSystem : int {
         eRightHanded, ///< up × front is the third axis
         eLeftHanded   ///< up × front is its opposite
@@ -41,29 +41,29 @@ public:
     };
 
     constexpr FbxAxisSystem() = default; ///< Y up, odd, right-handed
-    /// What is no axis or no parity gives the default system.
+    /// Numbers that are no axis or no parity give the default system.
     FbxAxisSystem(EUpVector pUpVector, EFrontVector pFrontVector, ECoordSystem pCoorSystem);
     /// The system of that program.
     FbxAxisSystem(EPreDefinedAxisSystem pAxisSystem);
 
-    bool operator==(const FbxAxisSystem& pOther) const; ///< Same axes, same signs and same hand.
+    bool operator==(const FbxAxisSystem& pOther) const; ///< Same axes, same signs and same handedness.
     bool operator!=(const FbxAxisSystem& pOther) const { return !(*this == pOther); } ///< The opposite.
 
-    /// Turns the nodes below the root, so that every global matrix is the old one seen from the new system, and with
-    /// them cameras and bind matrices. Rotation curves and mesh points stay. A change of handedness alone turns
+    /// Rotates the nodes below the root, so that every global matrix is the old one expressed in the new system, and
+    /// with them cameras and bind matrices. Rotation curves and mesh points stay. A change of handedness alone rotates
     /// nothing. The scene's global settings state this system afterwards; a scene that has it already, and null, are
-    /// left alone.
+    /// left unchanged.
     void ConvertScene(FbxScene* pScene) const;
-    /// The same for the children of that node in place of the root's.
+    /// The same for the children of that node instead of the root's.
     void ConvertScene(FbxScene* pScene, FbxNode* pFbxRoot) const;
-    /// Turns the children of the node alone: cameras, bind matrices and global settings stay.
+    /// Rotates the children of the node only: cameras, bind matrices and global settings stay.
     void ConvertChildren(FbxNode* pRoot, const FbxAxisSystem& pSrcSystem) const;
 
     /// The axis without its sign, which becomes pSign: 1 or -1.
     [[nodiscard]] EUpVector GetUpVector(int& pSign) const;
     /// The parity without its sign, which becomes pSign: 1 or -1.
     [[nodiscard]] EFrontVector GetFrontVector(int& pSign) const;
-    [[nodiscard]] ECoordSystem GetCoorSystem() const { return mCoorSystem; } ///< Of which hand it is.
+    [[nodiscard]] ECoordSystem GetCoorSystem() const { return mCoorSystem; } ///< The handedness.
 
     static const FbxAxisSystem MayaZUp, ///< Z up, -Y front, right-handed
         MayaYUp,                        ///< Y up, Z front, right-handed
@@ -73,8 +73,8 @@ public:
         DirectX,                        ///< Y up, Z front, left-handed
         Lightwave;                      ///< Y up, Z front, left-handed
 
-    /// The system of three axes as files state them: 0 X, 1 Y, 2 Z, each with a sign. Axes that do not make a system
-    /// give the default one.
+    /// The system of three axes as files state them: 0 X, 1 Y, 2 Z, each with a sign. Inconsistent axes
+    /// give the default system.
     static FbxAxisSystem fromAxes(int pUp, int pUpSign, int pFront, int pFrontSign, int pCoord, int pCoordSign);
     /// The three axes as files state them.
     struct Axes {
@@ -85,7 +85,7 @@ public:
             coord,     ///< the third axis
             coordSign; ///< 1 or -1
     };
-    [[nodiscard]] Axes axes() const; ///< What fromAxes makes this system of.
+    [[nodiscard]] Axes axes() const; ///< The axes from which fromAxes creates this system.
 
 private:
     int mUp = eYAxis;

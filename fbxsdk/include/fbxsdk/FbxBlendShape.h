@@ -21,22 +21,23 @@ public:
 
     /// The geometry that it deforms; null when there is none.
     [[nodiscard]] FbxGeometry* GetGeometry();
-    /// Makes it deform that geometry and no other; null takes it away. False when it cannot be connected.
+    /// Makes it deform that geometry and no other; null removes it from its geometry. False when it cannot be
+    /// connected.
     bool SetGeometry(FbxGeometry* pGeometry);
 
-    /// False for null and when the channel is there already.
+    /// False for null and when the channel is already part of it.
     bool AddBlendShapeChannel(FbxBlendShapeChannel* pBlendShapeChannel);
-    /// Returns the channel, or null when it is none of the blend shape.
+    /// Returns the channel, or null when it is not the blend shape's.
     FbxBlendShapeChannel* RemoveBlendShapeChannel(FbxBlendShapeChannel* pBlendShapeChannel);
     /// How many channels there are.
     [[nodiscard]] int GetBlendShapeChannelCount() const { return static_cast<int>(mChannels.size()); }
-    /// The channel at that place; null out of range.
+    /// The channel at that index; null out of range.
     [[nodiscard]] FbxBlendShapeChannel* GetBlendShapeChannel(int pIndex);
     /// The same for a const blend shape.
     [[nodiscard]] const FbxBlendShapeChannel* GetBlendShapeChannel(int pIndex) const;
 
 protected:
-    /// Keeps the list of channels in step with the connections.
+    /// Keeps the list of channels consistent with the connections.
     FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:

@@ -8,27 +8,27 @@ FBXSDK_NAMESPACE_BEGIN
 
 /// A camera: film back, lens, view and clipping planes. Looks along its node's positive X axis with Y up.
 ///
-/// The properties are independent: setting one never changes another, so focal length and fields of view are kept in
-/// step by whoever needs it. Lengths are scene units where nothing else is said.
+/// The properties are independent: setting one never changes another, so the caller keeps focal length and fields of
+/// view consistent. Lengths are scene units unless stated otherwise.
 class FBXSDK_DLL FbxCamera : public FbxNodeAttribute {
     FBXSDK_OBJECT_DECLARE(FbxCamera, FbxNodeAttribute)
 
 public:
-    /// How space becomes a picture.
+    /// The projection.
     enum EProjectionType : int {
-        ePerspective, ///< lines meet at the camera
-        eOrthogonal   ///< lines stay parallel; OrthoZoom scales the picture
+        ePerspective, ///< perspective
+        eOrthogonal   ///< parallel; OrthoZoom scales the picture
     };
-    /// Which angle the property FieldOfView is, and which lens values count.
+    /// Which angle the property FieldOfView is, and which lens values are used.
     enum EApertureMode : int {
-        eHorizAndVert, ///< FieldOfViewX and FieldOfViewY count
-        eHorizontal,   ///< FieldOfView counts, over the width
-        eVertical,     ///< FieldOfView counts, over the height; the default
-        eFocalLength   ///< FocalLength counts
+        eHorizAndVert, ///< FieldOfViewX and FieldOfViewY are used
+        eHorizontal,   ///< FieldOfView is used, horizontal
+        eVertical,     ///< FieldOfView is used, vertical; the default
+        eFocalLength   ///< FocalLength is used
     };
     /// Film backs, width by height in inches.
     enum EApertureFormat : int {
-        eCustomAperture,    ///< any other
+        eCustomAperture,    ///< any other film back
         e16mmTheatrical,    ///< 0.404 × 0.295
         eSuper16mm,         ///< 0.493 × 0.292
         e35mmAcademy,       ///< 0.864 × 0.630
@@ -57,13 +57,13 @@ public:
     };
     /// What AspectWidth and AspectHeight mean.
     enum EAspectRatioMode : int {
-        eWindowSize,      ///< nothing; the window gives the shape
+        eWindowSize,      ///< nothing; the window determines the shape
         eFixedRatio,      ///< AspectWidth is the width for a height of 1
         eFixedResolution, ///< pixels
         eFixedWidth,      ///< AspectWidth is pixels, AspectHeight the height for a width of 1
         eFixedHeight      ///< AspectHeight is pixels, AspectWidth the width for a height of 1
     };
-    /// How the film back fits a picture of another shape.
+    /// How the film back is fitted to a picture of another shape.
     enum EGateFit : int {
         eFitNone,       ///< it is not fitted
         eFitVertical,   ///< by its height
@@ -78,13 +78,12 @@ public:
         eFocusSpecificDistance   ///< FocusDistance away from the camera
     };
 
-    FbxPropertyT<FbxDouble3>
-        Position,                 ///< the camera's place for files that have it on the attribute; (0, 0, 0), animatable
-        UpVector,                 ///< a direction; (0, 1, 0), animatable
-        InterestPosition;         ///< the point looked at; (0, 0, 0), animatable
-    FbxPropertyT<FbxDouble> Roll; ///< degrees; animatable
-    FbxPropertyT<FbxDouble> OpticalCenterX,         ///< 0, animatable; stored for applications
-        OpticalCenterY;                             ///< 0, animatable; stored for applications
+    FbxPropertyT<FbxDouble3> Position,      ///< position, in files that have it on the attribute; (0, 0, 0), animatable
+        UpVector,                           ///< a direction; (0, 1, 0), animatable
+        InterestPosition;                   ///< the point looked at; (0, 0, 0), animatable
+    FbxPropertyT<FbxDouble> Roll;           ///< degrees; animatable
+    FbxPropertyT<FbxDouble> OpticalCenterX, ///< 0, animatable; stored for applications
+        OpticalCenterY;                     ///< 0, animatable; stored for applications
     FbxPropertyT<FbxDouble3> BackgroundColor;       ///< 0 to 1; (0.63, 0.63, 0.63), animatable
     FbxPropertyT<EAspectRatioMode> AspectRatioMode; ///< eWindowSize by default
     FbxPropertyT<FbxDouble> AspectWidth,            ///< as AspectRatioMode says; 320
@@ -95,7 +94,7 @@ public:
     FbxPropertyT<FbxDouble> FilmWidth,              ///< inches; 0.816
         FilmHeight;                                 ///< inches; 0.612
     FbxPropertyT<FbxDouble> FilmAspectRatio,        ///< width over height; 4/3
-        FilmSqueezeRatio;                           ///< how much the lens squeezes the width; 1
+        FilmSqueezeRatio;                           ///< squeeze factor of the lens in width; 1
     FbxPropertyT<EApertureFormat> FilmFormat;       ///< in files FilmFormatIndex; eCustomAperture by default
     FbxPropertyT<EApertureMode> ApertureMode;       ///< eVertical by default
     FbxPropertyT<EGateFit> GateFit;                 ///< eFitNone by default
@@ -120,24 +119,24 @@ public:
     void SetAspect(EAspectRatioMode pRatioMode, double pWidth, double pHeight);
     void SetPixelRatio(double pRatio);          ///< The property PixelAspectRatio, unchecked.
     [[nodiscard]] double GetPixelRatio() const; ///< Width of a pixel over its height.
-    /// The distance, held between 0.001 and 600000; the property itself takes any.
+    /// The distance, clamped to 0.001 and 600000; the property itself accepts any.
     void SetNearPlane(double pDistance);
     [[nodiscard]] double GetNearPlane() const; ///< As stored, also when out of that range.
-    /// The distance, held between 0.001 and 600000; the property itself takes any.
+    /// The distance, clamped to 0.001 and 600000; the property itself accepts any.
     void SetFarPlane(double pDistance);
     [[nodiscard]] double GetFarPlane() const; ///< As stored, also when out of that range.
 
     void SetApertureMode(EApertureMode pMode);           ///< The property ApertureMode; no lens value changes.
     [[nodiscard]] EApertureMode GetApertureMode() const; ///< A number from a file may be no enumerator.
-    /// With any format but the custom one also sets the film's width, height, aspect and squeeze ratio.
+    /// With any format but the custom one, also sets the film's width, height, aspect and squeeze ratio.
     void SetApertureFormat(EApertureFormat pFormat);
-    [[nodiscard]] EApertureFormat GetApertureFormat() const; ///< As stored; the film's measures may differ.
+    [[nodiscard]] EApertureFormat GetApertureFormat() const; ///< As stored; the film's dimensions may differ.
     void SetApertureWidth(double pWidth);                    ///< Inches; the format stays as it is.
     [[nodiscard]] double GetApertureWidth() const;           ///< Inches.
     void SetApertureHeight(double pHeight);                  ///< Inches; the format stays as it is.
     [[nodiscard]] double GetApertureHeight() const;          ///< Inches.
     void SetSqueezeRatio(double pRatio);                     ///< The property FilmSqueezeRatio, unchecked.
-    [[nodiscard]] double GetSqueezeRatio() const;            ///< 1 for lenses that do not squeeze.
+    [[nodiscard]] double GetSqueezeRatio() const;            ///< 1 for spherical lenses.
 
     /// The full angle in degrees that a focal length in millimetres has over the film: over its height in vertical
     /// mode, over its squeezed width in the others. Changes no property.

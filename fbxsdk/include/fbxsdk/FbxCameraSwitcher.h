@@ -6,7 +6,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// The switcher: which of the scene's cameras is live. A scene has one at most, in FbxGlobalCameraSettings.
+/// The switcher selects which of the scene's cameras is live. A scene has at most one, in FbxGlobalCameraSettings.
 class FBXSDK_DLL FbxCameraSwitcher : public FbxNodeAttribute {
     FBXSDK_OBJECT_DECLARE(FbxCameraSwitcher, FbxNodeAttribute)
 

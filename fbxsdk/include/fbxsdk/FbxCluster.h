@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The control points that follow one node, and how strongly.
 #pragma once
 
 #include <fbxsdk/FbxAMatrix.h>
@@ -12,17 +10,17 @@ FBXSDK_NAMESPACE_BEGIN
 
 class FbxNode;
 
-/// The control points that follow one node, and how strongly. Indices and weights that stand in a file are read on the
+/// The control points that follow one node, and how strongly. Indices and weights of a file are read on the
 /// first access; the indices are not checked against the geometry.
 class FBXSDK_DLL FbxCluster : public FbxSubDeformer {
     FBXSDK_OBJECT_DECLARE(FbxCluster, FbxSubDeformer)
 
 public:
-    /// How the weights of a point count.
+    /// How the weights of a point are applied.
     enum ELinkMode {
-        eNormalize, ///< brought to a sum of 1; the default
-        eAdditive,  ///< each added on to what the point was, relative to the associate model
-        eTotalOne   ///< taken as they are, with what is missing to 1 staying undeformed
+        eNormalize, ///< normalised to a sum of 1; the default
+        eAdditive,  ///< each added to the point so far, relative to the associate model
+        eTotalOne   ///< taken as they are; the remainder to 1 stays undeformed
     };
 
     [[nodiscard]] EType GetSubDeformerType() const override; ///< eCluster.
@@ -30,22 +28,22 @@ public:
     void SetLinkMode(ELinkMode pMode) { mLinkMode = pMode; }          ///< Any value is stored.
     [[nodiscard]] ELinkMode GetLinkMode() const { return mLinkMode; } ///< eNormalize by default.
 
-    /// Makes it the node that the points follow, in place of any other; null removes it.
+    /// Sets the node that the points follow, replacing any other; null removes it.
     void SetLink(const FbxNode* pNode);
     /// The node that the points follow: the cluster's first source node. Null when there is none.
     [[nodiscard]] FbxNode* GetLink() { return mLink; }
     /// The same for a const cluster.
     [[nodiscard]] const FbxNode* GetLink() const { return mLink; }
-    /// Makes it the node that additive weights are relative to, in place of any other; null removes it.
+    /// Sets the node that additive weights are relative to, replacing any other; null removes it.
     void SetAssociateModel(FbxNode* pNode);
     [[nodiscard]] FbxNode* GetAssociateModel() const; ///< Null when there is none.
 
-    /// Appends a point and its weight; neither is checked, and a point may come again.
+    /// Appends a point and its weight; neither is checked, and a point may occur repeatedly.
     void AddControlPointIndex(int pIndex, double pWeight);
     [[nodiscard]] int GetControlPointIndicesCount() const; ///< How many points have a weight.
     /// The points, as many as the count says; null when there are none. Valid until the count changes.
     [[nodiscard]] int* GetControlPointIndices() const;
-    /// Their weights, 0 to 1 mostly; null when there are none. Valid until the count changes.
+    /// Their weights, usually 0 to 1; null when there are none. Valid until the count changes.
     [[nodiscard]] double* GetControlPointWeights() const;
 
     /// The global transform of the deformed geometry's node at the time of binding.
@@ -69,13 +67,13 @@ public:
     /// Whether SetTransformParentMatrix was called.
     [[nodiscard]] bool IsTransformParentSet() const { return mTransformParentSet; }
 
-    /// The platform's own view: of indices and weights the first ones count, as many as there are of both.
+    /// The platform's own view: the first indices and weights, as many as there are of both.
     [[nodiscard]] detail::PlainArray<int>& indices() { return mIndices; }
     /// The same of the weights.
     [[nodiscard]] detail::PlainArray<double>& weights() { return mWeights; }
 
 protected:
-    /// Keeps the link in step with the connections.
+    /// Keeps the link consistent with the connections.
     FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:

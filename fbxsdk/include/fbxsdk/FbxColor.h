@@ -6,7 +6,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// Red, green, blue and alpha, 0 to 1 where they can be shown; any number is stored.
+/// Red, green, blue and alpha, 0 to 1 where they can be displayed; any number is stored.
 class FBXSDK_DLL FbxColor {
 public:
     constexpr FbxColor() = default; ///< Opaque black.
@@ -23,7 +23,7 @@ public:
     void Set(const double pRed, const double pGreen, const double pBlue, const double pAlpha = 1.0) {
         *this = FbxColor(pRed, pGreen, pBlue, pAlpha);
     }
-    /// Whether all four components lie in 0 to 1.
+    /// Whether all four components are within 0 to 1.
     [[nodiscard]] bool IsValid() const;
 
     /// 0 red, 1 green, 2 blue, anything else alpha.

@@ -27,9 +27,9 @@ public:
     FbxCriteria operator!() const;                           ///< What does not meet this one.
 
     [[nodiscard]] bool isMetBy(const FbxClassId& pClassId) const; ///< Whether objects of exactly that class meet it.
-    /// Made with &&, || or !.
+    /// Created with &&, || or !.
     [[nodiscard]] bool isCombined() const { return mOperands != nullptr; }
-    /// Whether both are the same without looking into what they are combined of.
+    /// Whether both are the same, without comparing the criteria that they combine.
     [[nodiscard]] bool isSame(const FbxCriteria& pOther) const {
         return mKind == pOther.mKind && mClassId == pOther.mClassId && mOperands == pOther.mOperands;
     }
@@ -39,7 +39,7 @@ private:
     enum class Kind : unsigned char { any, type, strictType, property, both, either, inverse };
     Kind mKind = Kind::any;
     FbxClassId mClassId;
-    std::shared_ptr<const Node> mOperands; ///< of both, either and inverse
+    std::shared_ptr<const Node> mOperands; ///< operands of a combination
 };
 
 FBXSDK_NAMESPACE_END

@@ -18,17 +18,17 @@ struct PropertyTypeInfo {
 
 } // namespace detail
 
-/// The type of a property: what it holds and how files spell it. Cheap to copy; compares by identity, so that two types
-/// that hold the same may differ in their spelling.
+/// The type of a property: the kind of its value and its spelling in files. Cheap to copy; compares by identity, so
+/// that two types of the same values may differ in their spelling.
 class FBXSDK_DLL FbxDataType {
 public:
     constexpr FbxDataType() = default;                                                      ///< The undefined type.
     explicit constexpr FbxDataType(const detail::PropertyTypeInfo* pInfo) : mInfo(pInfo) {} ///< The platform's own.
 
-    [[nodiscard]] bool Valid() const { return mInfo != nullptr; } ///< False for the undefined type alone.
-    /// What values it holds; eFbxUndefined also for compounds.
+    [[nodiscard]] bool Valid() const { return mInfo != nullptr; } ///< False only for the undefined type.
+    /// The type of its values; eFbxUndefined also for compounds.
     [[nodiscard]] EFbxType GetType() const { return mInfo ? mInfo->type : eFbxUndefined; }
-    /// A name to show, not unique; empty for the undefined type.
+    /// A name for display, not unique; empty for the undefined type.
     [[nodiscard]] const char* GetName() const { return mInfo ? mInfo->apiName : ""; }
     [[nodiscard]] bool Is(const FbxDataType& pOther) const { return mInfo == pOther.mInfo; } ///< The same as ==.
     /// Whether both are the same type.

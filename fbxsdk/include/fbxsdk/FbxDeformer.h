@@ -1,14 +1,14 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The base of what deforms geometry, and of the parts of deformers.
+// The base of deformers, and of their parts.
 #pragma once
 
 #include <fbxsdk/FbxObject.h>
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// What moves the points of geometry. A deformer is a source of the geometry that it deforms.
+/// The base of deformers, which move the points of geometry. A deformer is a source of the geometry that it deforms.
 class FBXSDK_DLL FbxDeformer : public FbxObject {
     FBXSDK_ABSTRACT_DECLARE(FbxDeformer, FbxObject)
 

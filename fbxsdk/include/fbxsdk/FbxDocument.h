@@ -6,7 +6,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// What can be imported and exported as a whole. Scenes are the only documents.
+/// The unit of import and export. Scenes are the only documents.
 class FBXSDK_DLL FbxDocument : public FbxCollection {
     FBXSDK_OBJECT_DECLARE(FbxDocument, FbxCollection)
 

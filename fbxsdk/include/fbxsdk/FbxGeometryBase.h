@@ -7,7 +7,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// Control points with layers. What a file holds of them is read when it is first asked for; a file that has been
+/// Control points with layers. The content of a file is read on the first access; a file that has been
 /// changed since then makes such a call throw std::runtime_error.
 class FBXSDK_DLL FbxGeometryBase : public FbxLayerContainer {
     FBXSDK_ABSTRACT_DECLARE(FbxGeometryBase, FbxLayerContainer)
@@ -22,15 +22,15 @@ public:
     /// Exactly that many points, all of them (0, 0, 0, 1). Negative counts as 0.
     virtual void InitControlPoints(int pCount);
     [[nodiscard]] virtual int GetControlPointsCount() const; ///< 0 for new geometry.
-    /// One contiguous run in the geometry's own space, valid until the count changes; writing to it changes the points.
-    /// Null when there are no points; the status then says so.
+    /// A contiguous array in the geometry's own space, valid until the count changes; writing to it changes the points.
+    /// Null, with a status, when there are no points.
     [[nodiscard]] virtual FbxVector4* GetControlPoints(FbxStatus* pStatus = nullptr) const;
     /// No effect out of range.
     virtual void SetControlPointAt(const FbxVector4& pCtrlPoint, int pIndex);
     /// A copy of the point; (0, 0, 0, 1) out of range.
     [[nodiscard]] virtual FbxVector4 GetControlPointAt(int pIndex) const;
 
-    /// The platform's own view: the points as they are, without asking the file.
+    /// The platform's own view: the points in memory, without reading the file.
     [[nodiscard]] detail::PlainArray<FbxVector4>& points() { return mControlPoints; }
 
 private:

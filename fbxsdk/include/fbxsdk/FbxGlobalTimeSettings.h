@@ -11,7 +11,7 @@ class FbxScene;
 /// Time settings of files before 7.x. They are those of FbxGlobalSettings, under another name.
 class FBXSDK_DLL FbxGlobalTimeSettings {
 public:
-    explicit FbxGlobalTimeSettings(FbxScene& pScene) : mScene(&pScene) {} ///< For the scene, which has one of its own.
+    explicit FbxGlobalTimeSettings(FbxScene& pScene) : mScene(&pScene) {} ///< For the scene, which owns one.
 
     void SetTimeMode(FbxTime::EMode pTimeMode);       ///< Also becomes the thread's global time mode.
     [[nodiscard]] FbxTime::EMode GetTimeMode() const; ///< The scene's time mode.

@@ -11,16 +11,16 @@ FBXSDK_NAMESPACE_BEGIN
 
 class FbxIOSettings;
 
-/// What importers and exporters share: a file name and the outcome of the last operation.
+/// The common part of importers and exporters: a file name and the outcome of the last operation.
 class FBXSDK_DLL FbxIOBase : public FbxObject {
     FBXSDK_ABSTRACT_DECLARE(FbxIOBase, FbxObject)
 
 public:
-    /// Takes the file's name. A format of -1 is found out. Settings are accepted and of no effect. False for a null or
+    /// Takes the file's name. A format of -1 is detected. Settings are accepted and have no effect. False for a null or
     /// empty name.
     virtual bool Initialize(const char* pFileName, int pFileFormat = -1, FbxIOSettings* pIOSettings = nullptr);
     [[nodiscard]] virtual FbxString GetFileName() const; ///< As given to Initialize, UTF-8; empty before.
-    /// Why the last operation failed: which file, where in it, what is wrong. Good after success. Belongs to the
+    /// Why the last operation failed: which file, where in it, what is wrong. Success otherwise. Owned by the
     /// object.
     [[nodiscard]] FbxStatus& GetStatus() { return mStatus; }
 

@@ -25,12 +25,12 @@ public:
     [[nodiscard]] int GetNativeWriterFormat() const;       ///< Binary FBX.
     /// The writer with exactly that description; -1 when there is none and for null.
     [[nodiscard]] int FindWriterIDByDescription(const char* pDescription) const;
-    /// The first writer for the extension, which is given without a dot and counts without regard to case; -1 when
+    /// The first writer for the extension, which is given without a dot and compared without regard to case; -1 when
     /// there is none and for null.
     [[nodiscard]] int FindWriterIDByExtension(const char* pExtension) const;
     /// The reader for the file, by its content. False, with -1, when it is missing or no FBX file.
     bool DetectReaderFileFormat(const char* pFileName, int& pFileFormat) const;
-    /// The version strings that the writer takes, ended by null; null for no format.
+    /// The version strings that the writer accepts, terminated by null; null for no format.
     [[nodiscard]] char const* const* GetWritableVersions(int pFileFormat) const;
 };
 

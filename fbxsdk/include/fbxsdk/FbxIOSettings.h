@@ -7,7 +7,7 @@
 
 #include <fbxsdk/FbxObject.h>
 
-/// The name that hosts give their settings object; any other does as well.
+/// The name that hosts give their settings object; any other works as well.
 #define IOSROOT "IOSRoot"
 /// The path of the option: read materials.
 #define IMP_FBX_MATERIAL "Import|AdvOptGrp|FileFormat|Fbx|Material"
@@ -27,7 +27,7 @@
 #define EXP_FBX_MATERIAL "Export|AdvOptGrp|Fbx|Material"
 /// The path of the option: write textures.
 #define EXP_FBX_TEXTURE "Export|AdvOptGrp|Fbx|Texture"
-/// The path of the option: put media into the file.
+/// The path of the option: embed media in the file.
 #define EXP_FBX_EMBEDDED "Export|AdvOptGrp|Fbx|EMBEDDED"
 /// The path of the option: write blend shapes.
 #define EXP_FBX_SHAPE "Export|AdvOptGrp|Fbx|Shape"
@@ -40,15 +40,15 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// Options of import and export: true or false under paths that are known beforehand.
+/// Options of import and export: true or false under a fixed set of paths.
 ///
-/// Importers and exporters accept settings and do not follow them: everything is read and written, and media are not
-/// embedded. Setting an unknown path does nothing; asking for one gives the default passed along.
+/// Importers and exporters accept settings and ignore them: everything is read and written, and media are not
+/// embedded. Setting an unknown path has no effect; getting one returns the default that was passed.
 class FBXSDK_DLL FbxIOSettings : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxIOSettings, FbxObject)
 
 public:
-    /// Sets the option of that path, one of the IMP_FBX_… and EXP_FBX_… macros; nothing happens for any other and for
+    /// Sets the option of that path, one of the IMP_FBX_… and EXP_FBX_… macros; no effect for any other and for
     /// null.
     void SetBoolProp(const char* pName, bool pValue);
     /// The option of that path: true until set, for EXP_FBX_EMBEDDED false; pDefValue for an unknown path and null.

@@ -14,7 +14,7 @@ class FBXSDK_DLL FbxLODGroup : public FbxNodeAttribute {
 
 public:
     FbxPropertyT<FbxBool> ThresholdsUsedAsPercentage; ///< percent of the picture instead of distances; false
-    FbxPropertyT<FbxBool> MinMaxDistance;             ///< whether the two distances count; false
+    FbxPropertyT<FbxBool> MinMaxDistance;             ///< whether the two distances are used; false
     FbxPropertyT<FbxDouble> MinDistance,              ///< below it nothing is shown, scene units; -100
         MaxDistance;                                  ///< beyond it nothing is shown, scene units; 100
     FbxPropertyT<FbxBool> WorldSpace;                 ///< distances in the world, else in the group's own space; false

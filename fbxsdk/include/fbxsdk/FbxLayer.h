@@ -1,7 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What geometry carries beside its points: normals, texture coordinates, colours, materials, … as elements in layers.
+// The data of geometry other than its points: normals, texture coordinates, colours, materials, … as elements in
+// layers.
 #pragma once
 
 #include <memory>
@@ -26,7 +27,7 @@ namespace detail {
 struct GeometrySource;
 struct LayerElementAccess;
 
-/// What new items of an array hold: all bits zero, the w of vectors and the alpha of colours included.
+/// The value of new items of an array: all bits zero, the w of vectors and the alpha of colours included.
 template <class T>
 inline T zeroItem() {
     return T();
@@ -41,15 +42,15 @@ inline FbxColor zeroItem<FbxColor>() {
 }
 } // namespace detail
 
-/// What new items of an array hold.
+/// The value of new items of an array.
 enum EFbxMemoryClearMode {
     eClearToZero ///< all bits zero
 };
 
-/// The part of an element's array that does not depend on its type. Arrays belong to their element.
+/// The type-independent part of an element's array. Arrays belong to their element.
 class FBXSDK_DLL FbxLayerElementArray {
 public:
-    /// What a pointer to the items is used for; of no effect, as nothing is locked.
+    /// The use of a pointer to the items; without effect, as nothing is locked.
     enum ELockMode {
         eReadLock = 1,     ///< reading
         eWriteLock = 2,    ///< writing
@@ -72,7 +73,7 @@ private:
 /// A contiguous array of plain items. New items are all zero; an index out of range reads as a zero item and writes
 /// nowhere.
 ///
-/// Items of a file stay in it until they are asked for; a file that has been changed since then makes such a call throw
+/// Items of a file are read on the first access; a file that has been changed since then makes such a call throw
 /// std::runtime_error.
 template <class T>
 class FbxLayerElementArrayTemplate : public FbxLayerElementArray {
@@ -149,7 +150,8 @@ public:
     /// Unlike elsewhere the index must be in range.
     T& operator[](int pIndex) const { return mItems[pIndex]; }
 
-    /// All items as one run; null when there are none. Nothing is locked: the pointer is valid until the count changes.
+    /// All items, contiguous; null when there are none. Nothing is locked: the pointer is valid until the count
+    /// changes.
     [[nodiscard]] T* GetLocked(T* = nullptr, ELockMode = eReadWriteLock) const {
         return GetCount() == 0 ? nullptr : mItems.data();
     }
@@ -167,7 +169,7 @@ private:
 };
 
 /// One property of the points, corners or polygons of a geometry: values, indices of values, and what they belong to.
-/// Belongs to its container and lives until Destroy or the container's end, whether it is in a layer or not.
+/// Owned by its container until Destroy or the container's end, whether it is in a layer or not.
 class FBXSDK_DLL FbxLayerElement {
 public:
     /// What the element is. The numbers are part of the API.
@@ -232,15 +234,15 @@ public:
     void SetName(const char* pName) { mName = pName ? pName : ""; }                  ///< UTF-8; null is the empty name.
     [[nodiscard]] const char* GetName() const { return mName.c_str(); } ///< Never null; valid until the name changes.
 
-    /// Takes the element out of its layers and frees it.
+    /// Removes the element from its layers and frees it.
     void Destroy();
 
 protected:
     FBXSDK_LOCAL FbxLayerElement(); ///< For derived classes.
     FBXSDK_LOCAL virtual ~FbxLayerElement();
 
-    FBXSDK_LOCAL void joinOwner(FbxLayerContainer* pOwner); ///< Makes it the container's; null changes nothing.
-    /// Removes entries from the array that the mapping counts in: the index array where indices are in use.
+    FBXSDK_LOCAL void joinOwner(FbxLayerContainer* pOwner); ///< Transfers it to the container; null changes nothing.
+    /// Removes entries from the array that the mapping indexes: the index array where indices are in use.
     virtual void removeEntries(int pFirst, int pCount) = 0;
 
 private:
@@ -257,19 +259,19 @@ namespace detail {
 [[noreturn]] FBXSDK_DLL void throwMissingIndexArray();
 } // namespace detail
 
-/// An element whose values are of type T. What a file holds of its arrays is read when they are first asked for.
+/// An element whose values are of type T. Arrays of a file are read on the first access.
 template <class T>
 class FbxLayerElementTemplate : public FbxLayerElement {
 public:
     using ArrayElementType = T; ///< The type of the values.
 
-    /// Throws std::runtime_error when there is no such array, which is so in damaged elements only.
+    /// Throws std::runtime_error when there is no such array, which happens in damaged elements only.
     [[nodiscard]] FbxLayerElementArrayTemplate<T>& GetDirectArray() const {
         if (!mDirectArray)
             detail::throwMissingDirectArray();
         return *mDirectArray;
     }
-    /// Empty unless the reference mode asks for indices.
+    /// Empty unless the reference mode uses indices.
     [[nodiscard]] FbxLayerElementArrayTemplate<int>& GetIndexArray() const {
         if (!mIndexArray)
             detail::throwMissingIndexArray();
@@ -282,7 +284,7 @@ protected:
     FbxLayerElementTemplate(); ///< Two empty arrays.
     ~FbxLayerElementTemplate() override;
 
-    /// Takes entries out of the array that the mapping counts in.
+    /// Removes entries from the array that the mapping indexes.
     void removeEntries(int pFirst, int pCount) override;
 
 private:
@@ -300,8 +302,8 @@ extern template class FBXSDK_DLL FbxLayerElementTemplate<bool>;
 extern template class FBXSDK_DLL FbxLayerElementTemplate<FbxSurfaceMaterial*>;
 extern template class FBXSDK_DLL FbxLayerElementTemplate<FbxTexture*>;
 
-/// What every class of elements declares. The new element belongs to the owner but is in no layer yet; with a null
-/// owner it has no owner until it is put into a layer.
+/// The declarations common to all element classes. The new element belongs to the owner but is in no layer yet; with a
+/// null owner it has no owner until it is put into a layer.
 #define FBXSDK_LAYER_ELEMENT_DECLARE(Class)                                                                            \
 public:                                                                                                                \
     /** Makes an element that belongs to the owner and is in no layer yet; a null name is the empty name. */           \
@@ -315,7 +317,7 @@ protected:                                                                      
 private:                                                                                                               \
     friend struct detail::LayerElementAccess;
 
-/// Normals, of length 1 in most files; they are handed out as stored, the w too: 1 where a file has none.
+/// Normals, of length 1 in most files; they are returned as stored, the w too: 1 where a file has none.
 class FBXSDK_DLL FbxLayerElementNormal : public FbxLayerElementTemplate<FbxVector4> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementNormal)
 };
@@ -335,7 +337,7 @@ class FBXSDK_DLL FbxLayerElementMaterial : public FbxLayerElementTemplate<FbxSur
 class FBXSDK_DLL FbxLayerElementPolygonGroup : public FbxLayerElementTemplate<int> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementPolygonGroup)
 };
-/// Texture coordinates, mostly with indices; the image lies between 0 and 1.
+/// Texture coordinates, usually with indices; the image is between 0 and 1.
 class FBXSDK_DLL FbxLayerElementUV : public FbxLayerElementTemplate<FbxVector2> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementUV)
 };
@@ -343,7 +345,7 @@ class FBXSDK_DLL FbxLayerElementUV : public FbxLayerElementTemplate<FbxVector2> 
 class FBXSDK_DLL FbxLayerElementVertexColor : public FbxLayerElementTemplate<FbxColor> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementVertexColor)
 };
-/// By polygon the values are bits of smoothing groups, by edge 0 is hard and anything else soft.
+/// By polygon the values are bits of smoothing groups; by edge 0 is hard and anything else soft.
 class FBXSDK_DLL FbxLayerElementSmoothing : public FbxLayerElementTemplate<int> {
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementSmoothing)
 };
@@ -364,23 +366,23 @@ class FBXSDK_DLL FbxLayerElementTexture : public FbxLayerElementTemplate<FbxText
     FBXSDK_LAYER_ELEMENT_DECLARE(FbxLayerElementTexture)
 };
 
-typedef FbxLayerElement FbxGeometryElement;                         ///< The same under another name of the API.
-typedef FbxLayerElementNormal FbxGeometryElementNormal;             ///< The same under another name of the API.
-typedef FbxLayerElementBinormal FbxGeometryElementBinormal;         ///< The same under another name of the API.
-typedef FbxLayerElementTangent FbxGeometryElementTangent;           ///< The same under another name of the API.
-typedef FbxLayerElementMaterial FbxGeometryElementMaterial;         ///< The same under another name of the API.
-typedef FbxLayerElementPolygonGroup FbxGeometryElementPolygonGroup; ///< The same under another name of the API.
-typedef FbxLayerElementUV FbxGeometryElementUV;                     ///< The same under another name of the API.
-typedef FbxLayerElementVertexColor FbxGeometryElementVertexColor;   ///< The same under another name of the API.
-typedef FbxLayerElementSmoothing FbxGeometryElementSmoothing;       ///< The same under another name of the API.
-typedef FbxLayerElementCrease FbxGeometryElementCrease;             ///< The same under another name of the API.
-typedef FbxLayerElementHole FbxGeometryElementHole;                 ///< The same under another name of the API.
-typedef FbxLayerElementVisibility FbxGeometryElementVisibility;     ///< The same under another name of the API.
+typedef FbxLayerElement FbxGeometryElement;                         ///< An alias of the API.
+typedef FbxLayerElementNormal FbxGeometryElementNormal;             ///< An alias of the API.
+typedef FbxLayerElementBinormal FbxGeometryElementBinormal;         ///< An alias of the API.
+typedef FbxLayerElementTangent FbxGeometryElementTangent;           ///< An alias of the API.
+typedef FbxLayerElementMaterial FbxGeometryElementMaterial;         ///< An alias of the API.
+typedef FbxLayerElementPolygonGroup FbxGeometryElementPolygonGroup; ///< An alias of the API.
+typedef FbxLayerElementUV FbxGeometryElementUV;                     ///< An alias of the API.
+typedef FbxLayerElementVertexColor FbxGeometryElementVertexColor;   ///< An alias of the API.
+typedef FbxLayerElementSmoothing FbxGeometryElementSmoothing;       ///< An alias of the API.
+typedef FbxLayerElementCrease FbxGeometryElementCrease;             ///< An alias of the API.
+typedef FbxLayerElementHole FbxGeometryElementHole;                 ///< An alias of the API.
+typedef FbxLayerElementVisibility FbxGeometryElementVisibility;     ///< An alias of the API.
 
-/// A place for elements: at most one of each type; textures and texture coordinates one for each texture channel.
+/// A set of elements: at most one of each type; textures and texture coordinates one for each texture channel.
 ///
-/// Layers belong to their container. Getters are null when the layer has no such element. Setters replace it and hand
-/// the new one to the layer's container; null takes it out, and it lives on until the container's end.
+/// Layers belong to their container. Getters are null when the layer has no such element. Setters replace it and
+/// transfer the new one to the layer's container; null removes it, and the container still owns it.
 class FBXSDK_DLL FbxLayer {
 public:
     FbxLayer(const FbxLayer&) = delete;
@@ -392,7 +394,7 @@ public:
     [[nodiscard]] const FbxLayerElementNormal* GetNormals() const {
         return get<FbxLayerElementNormal>(FbxLayerElement::eNormal);
     }
-    /// Puts them into the layer, in place of any others.
+    /// Puts them into the layer, replacing any others.
     void SetNormals(FbxLayerElementNormal* pNormals) { set(pNormals, FbxLayerElement::eNormal); }
 
     /// The layer's binormals; null when it has none.
@@ -403,7 +405,7 @@ public:
     [[nodiscard]] const FbxLayerElementBinormal* GetBinormals() const {
         return get<FbxLayerElementBinormal>(FbxLayerElement::eBiNormal);
     }
-    /// Puts them into the layer, in place of any others.
+    /// Puts them into the layer, replacing any others.
     void SetBinormals(FbxLayerElementBinormal* pBinormals) { set(pBinormals, FbxLayerElement::eBiNormal); }
 
     /// The layer's tangents; null when it has none.
@@ -414,10 +416,10 @@ public:
     [[nodiscard]] const FbxLayerElementTangent* GetTangents() const {
         return get<FbxLayerElementTangent>(FbxLayerElement::eTangent);
     }
-    /// Puts them into the layer, in place of any others.
+    /// Puts them into the layer, replacing any others.
     void SetTangents(FbxLayerElementTangent* pTangents) { set(pTangents, FbxLayerElement::eTangent); }
 
-    /// Which material of the node each polygon has; null when the layer does not say.
+    /// Which material of the node each polygon has; null when the layer does not define it.
     [[nodiscard]] FbxLayerElementMaterial* GetMaterials() {
         return get<FbxLayerElementMaterial>(FbxLayerElement::eMaterial);
     }
@@ -425,10 +427,10 @@ public:
     [[nodiscard]] const FbxLayerElementMaterial* GetMaterials() const {
         return get<FbxLayerElementMaterial>(FbxLayerElement::eMaterial);
     }
-    /// Puts them into the layer, in place of any others.
+    /// Puts them into the layer, replacing any others.
     void SetMaterials(FbxLayerElementMaterial* pMaterials) { set(pMaterials, FbxLayerElement::eMaterial); }
 
-    /// The group of each polygon; null when the layer does not say.
+    /// The group of each polygon; null when the layer does not define it.
     [[nodiscard]] FbxLayerElementPolygonGroup* GetPolygonGroups() {
         return get<FbxLayerElementPolygonGroup>(FbxLayerElement::ePolygonGroup);
     }
@@ -436,10 +438,10 @@ public:
     [[nodiscard]] const FbxLayerElementPolygonGroup* GetPolygonGroups() const {
         return get<FbxLayerElementPolygonGroup>(FbxLayerElement::ePolygonGroup);
     }
-    /// Puts them into the layer, in place of any others.
+    /// Puts them into the layer, replacing any others.
     void SetPolygonGroups(FbxLayerElementPolygonGroup* pGroups) { set(pGroups, FbxLayerElement::ePolygonGroup); }
 
-    /// The set of a texture channel; the diffuse one is the layer's ordinary set. Null for types that are no channel.
+    /// The set of a texture channel; the diffuse one is the layer's default set. Null for types that are no channel.
     [[nodiscard]] FbxLayerElementUV* GetUVs(FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eTextureDiffuse) {
         return isTextureChannel(pTypeIdentifier) ? get<FbxLayerElementUV>(uvSlot(pTypeIdentifier)) : nullptr;
     }
@@ -462,10 +464,10 @@ public:
     [[nodiscard]] const FbxLayerElementVertexColor* GetVertexColors() const {
         return get<FbxLayerElementVertexColor>(FbxLayerElement::eVertexColor);
     }
-    /// Puts them into the layer, in place of any others.
+    /// Puts them into the layer, replacing any others.
     void SetVertexColors(FbxLayerElementVertexColor* pColors) { set(pColors, FbxLayerElement::eVertexColor); }
 
-    /// The smoothing of edges or polygons; null when the layer does not say.
+    /// The smoothing of edges or polygons; null when the layer does not define it.
     [[nodiscard]] FbxLayerElementSmoothing* GetSmoothing() {
         return get<FbxLayerElementSmoothing>(FbxLayerElement::eSmoothing);
     }
@@ -473,7 +475,7 @@ public:
     [[nodiscard]] const FbxLayerElementSmoothing* GetSmoothing() const {
         return get<FbxLayerElementSmoothing>(FbxLayerElement::eSmoothing);
     }
-    /// Puts it into the layer, in place of any other.
+    /// Puts it into the layer, replacing any other.
     void SetSmoothing(FbxLayerElementSmoothing* pSmoothing) { set(pSmoothing, FbxLayerElement::eSmoothing); }
 
     /// The creases of control points; null when the layer has none.
@@ -484,7 +486,7 @@ public:
     [[nodiscard]] const FbxLayerElementCrease* GetVertexCrease() const {
         return get<FbxLayerElementCrease>(FbxLayerElement::eVertexCrease);
     }
-    /// Puts them into the layer, in place of any others.
+    /// Puts them into the layer, replacing any others.
     void SetVertexCrease(FbxLayerElementCrease* pCrease) { set(pCrease, FbxLayerElement::eVertexCrease); }
 
     /// The creases of edges; null when the layer has none.
@@ -495,19 +497,19 @@ public:
     [[nodiscard]] const FbxLayerElementCrease* GetEdgeCrease() const {
         return get<FbxLayerElementCrease>(FbxLayerElement::eEdgeCrease);
     }
-    /// Puts them into the layer, in place of any others.
+    /// Puts them into the layer, replacing any others.
     void SetEdgeCrease(FbxLayerElementCrease* pCrease) { set(pCrease, FbxLayerElement::eEdgeCrease); }
 
-    /// Which polygons are holes; null when the layer does not say.
+    /// Which polygons are holes; null when the layer does not define it.
     [[nodiscard]] FbxLayerElementHole* GetHole() { return get<FbxLayerElementHole>(FbxLayerElement::eHole); }
     /// The same for a const layer.
     [[nodiscard]] const FbxLayerElementHole* GetHole() const {
         return get<FbxLayerElementHole>(FbxLayerElement::eHole);
     }
-    /// Puts it into the layer, in place of any other.
+    /// Puts it into the layer, replacing any other.
     void SetHole(FbxLayerElementHole* pHole) { set(pHole, FbxLayerElement::eHole); }
 
-    /// What is shown; null when the layer does not say.
+    /// Which edges or polygons are shown; null when the layer does not define it.
     [[nodiscard]] FbxLayerElementVisibility* GetVisibility() {
         return get<FbxLayerElementVisibility>(FbxLayerElement::eVisibility);
     }
@@ -515,7 +517,7 @@ public:
     [[nodiscard]] const FbxLayerElementVisibility* GetVisibility() const {
         return get<FbxLayerElementVisibility>(FbxLayerElement::eVisibility);
     }
-    /// Puts it into the layer, in place of any other.
+    /// Puts it into the layer, replacing any other.
     void SetVisibility(FbxLayerElementVisibility* pVisibility) { set(pVisibility, FbxLayerElement::eVisibility); }
 
     /// The textures of a channel; null for types that are no channel.
@@ -559,14 +561,14 @@ private:
     FbxLayerElement* mElements[kSlotCount] = {};
 };
 
-/// A node attribute with layers. What stands in a file is read on the first access.
+/// A node attribute with layers. The content of a file is read on the first access.
 class FBXSDK_DLL FbxLayerContainer : public FbxNodeAttribute {
     FBXSDK_ABSTRACT_DECLARE(FbxLayerContainer, FbxNodeAttribute)
 
 public:
     /// Appends an empty layer. The new layer's index.
     int CreateLayer();
-    /// Removes all layers. Their elements live on until the container's end.
+    /// Removes all layers. Their elements still belong to the container.
     void ClearLayers();
     /// How many layers there are; 0 for new geometry.
     [[nodiscard]] int GetLayerCount() const {
@@ -575,27 +577,27 @@ public:
     }
     /// How many layers have an element of the type; with pUVCount, texture coordinates of the texture channel.
     [[nodiscard]] int GetLayerCount(FbxLayerElement::EType pType, bool pUVCount = false) const;
-    /// The layer at that place, which belongs to the container; null out of range.
+    /// The layer at that index, owned by the container; null out of range.
     [[nodiscard]] FbxLayer* GetLayer(int pIndex) { return layerAt(pIndex); }
     /// The same for a const container.
     [[nodiscard]] const FbxLayer* GetLayer(int pIndex) const { return layerAt(pIndex); }
 
-    /// For the scene reader: what the file holds of this object becomes its content on the first access.
+    /// For the scene reader: the content of this object in the file is read into it on the first access.
     void setSource(std::unique_ptr<detail::GeometrySource> pSource);
     [[nodiscard]] bool isPending() const { return mSource != nullptr; } ///< Whether the content is still to be read.
 
 protected:
-    /// Every access to what may still stand in the file starts with this.
+    /// Every access to content that may not be read yet starts with this.
     void ensureLoaded() const {
         if (mSource)
             loadSource();
     }
-    /// What follows changes the object: it is read if it can be, and the file is done with.
+    /// To be called before a change: the content is read if it can be, and the file is not used again.
     FBXSDK_LOCAL void detachSource();
     /// Fills the object from the file. False when that is not possible yet; the next access tries again.
     virtual bool readSource(const detail::GeometrySource& pSource) = 0;
 
-    /// For every element that stands in a layer and is mapped that way.
+    /// Removes the entries of every element that is in a layer and is mapped that way.
     FBXSDK_LOCAL void removeElementEntries(FbxLayerElement::EMappingMode pMappingMode, int pFirst, int pCount);
 
 private:
@@ -615,7 +617,7 @@ private:
     }
 
     std::vector<std::unique_ptr<FbxLayer, LayerDeleter>> mLayers;
-    std::vector<FbxLayerElement*> mElements; ///< all that belong to the container
+    std::vector<FbxLayerElement*> mElements; ///< all elements that the container owns
     mutable std::unique_ptr<detail::GeometrySource> mSource;
 };
 

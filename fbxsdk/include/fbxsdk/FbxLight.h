@@ -38,7 +38,7 @@ public:
     FbxPropertyT<FbxBool> DrawVolumetricLight,    ///< whether the cone itself is drawn; true
         DrawGroundProjection,                     ///< whether the light's spot on the ground is drawn; true
         DrawFrontFacingVolumetricLight;           ///< whether the cone is drawn toward the viewer; false
-    FbxPropertyT<FbxDouble> Intensity;            ///< percent; 100, animatable. Unit conversion leaves it alone
+    FbxPropertyT<FbxDouble> Intensity;            ///< percent; 100, animatable. Not changed by unit conversion
     FbxPropertyT<FbxDouble> InnerAngle,           ///< of the full cone of full light, degrees; 0, animatable
         OuterAngle;                               ///< of the full cone, degrees; 45, animatable
     FbxPropertyT<FbxDouble> Fog;                  ///< percent; 50, animatable
@@ -58,7 +58,7 @@ public:
         RightBarnDoor,                            ///< degrees; 20, animatable
         TopBarnDoor,                              ///< degrees; 20, animatable
         BottomBarnDoor;                           ///< degrees; 20, animatable
-    FbxPropertyT<FbxBool> EnableBarnDoor;         ///< whether the doors cut the cone off; false, animatable
+    FbxPropertyT<FbxBool> EnableBarnDoor;         ///< whether the barn doors limit the cone; false, animatable
 
     [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eLight.
 };

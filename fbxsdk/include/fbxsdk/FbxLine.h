@@ -16,18 +16,18 @@ public:
 
     [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eLine.
 
-    void SetIndexArraySize(int pCount);          ///< New entries are control point 0. Negative counts as 0.
+    void SetIndexArraySize(int pCount);          ///< New entries refer to control point 0. Negative counts as 0.
     [[nodiscard]] int GetIndexArraySize() const; ///< The entries of all polylines.
     /// Sets an entry to a control point, which need not exist. False out of range and for a negative point.
     bool SetPointIndexAt(int pValue, int pIndex, bool pAsEndPoint = false);
     /// The control point, also at the end of a polyline; -1 out of range.
     [[nodiscard]] int GetPointIndexAt(int pIndex) const;
-    /// How many polylines there are; a last one without an end does not count.
+    /// How many polylines there are; an unterminated last one does not count.
     [[nodiscard]] int GetEndPointCount() const;
-    /// Where in the index array that polyline ends; -1 out of range.
+    /// The position in the index array where that polyline ends; -1 out of range.
     [[nodiscard]] int GetEndPointAt(int pEndPointIndex) const;
 
-    /// The platform's own view: as it is, without asking the file.
+    /// The platform's own view: the entries in memory, without reading the file.
     [[nodiscard]] detail::PlainArray<int>& indices() { return mIndices; }
 
 protected:

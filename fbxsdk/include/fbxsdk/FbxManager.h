@@ -17,11 +17,11 @@ class ManagerData;
 
 /// The owner of every object.
 ///
-/// Any number of managers may exist at once; they share nothing. One manager and its objects are used by one thread at
-/// a time. Ended by Destroy alone; FbxManager is never deleted directly.
+/// Any number of managers may exist at once; they share nothing. A manager and its objects are used by one thread at
+/// a time. Only Destroy ends it; FbxManager is never deleted directly.
 class FBXSDK_DLL FbxManager {
 public:
-    /// A new manager without objects. Never null: where memory runs out std::bad_alloc is thrown.
+    /// A new manager without objects. Never null: when memory runs out std::bad_alloc is thrown.
     static FbxManager* Create();
     FbxManager(const FbxManager&) = delete;            ///< Managers are not copied.
     FbxManager& operator=(const FbxManager&) = delete; ///< Managers are not assigned.
@@ -30,11 +30,11 @@ public:
     /// invalid afterwards.
     virtual void Destroy();
 
-    /// The list of formats; never null, lives as long as the manager.
+    /// The list of formats; never null, valid as long as the manager.
     [[nodiscard]] FbxIOPluginRegistry* GetIOPluginRegistry() const;
-    /// Null until set. The settings stay the caller's; once they are destroyed the answer is null again.
+    /// Null until set. The caller owns the settings; once they are destroyed the result is null again.
     [[nodiscard]] virtual FbxIOSettings* GetIOSettings() const;
-    /// Keeps the pointer for GetIOSettings. Reading and writing do not follow the settings.
+    /// Stores the pointer for GetIOSettings. Reading and writing ignore the settings.
     virtual void SetIOSettings(FbxIOSettings* pIOSettings);
     /// The name and version of this platform; the same in both forms.
     static const char* GetVersion(bool pFull = true);

@@ -7,7 +7,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A mark at a place: a handle of a rig or a captured point.
+/// A marker at a position: a handle of a rig or a captured point.
 class FBXSDK_DLL FbxMarker : public FbxNodeAttribute {
     FBXSDK_OBJECT_DECLARE(FbxMarker, FbxNodeAttribute)
 

@@ -24,7 +24,7 @@ public:
     void SetColumn(int pX, const FbxVector4& pColumn);                  ///< 0 to 3; not checked.
 
     void SetIdentity() { *this = FbxAMatrix(); } ///< Ones on the diagonal.
-    /// Scales first, then turns by Euler angles in degrees (XYZ), then moves.
+    /// Scales first, then rotates by Euler angles in degrees (XYZ), then translates.
     void SetTRS(const FbxVector4& pT, const FbxVector4& pR, const FbxVector4& pS) { *this = FbxAMatrix(pT, pR, pS); }
 
     /// The right matrix acts first.

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Polygons over control points.
 #pragma once
 
 #include <fbxsdk/FbxGeometry.h>
@@ -9,7 +7,7 @@
 FBXSDK_NAMESPACE_BEGIN
 
 /// Polygons over control points. Polygon p has its corners, indices of control points, at GetPolygonVertexIndex(p) and
-/// the following places of the polygon vertex array. In a mesh read from a file all of them are control points that
+/// the following positions of the polygon vertex array. In a mesh read from a file all of them are control points that
 /// exist.
 class FBXSDK_DLL FbxMesh : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxMesh, FbxGeometry)
@@ -21,10 +19,10 @@ public:
     /// stores nothing.
     void BeginPolygon(int pMaterial = -1, int pTexture = -1, int pGroup = -1, bool pLegacy = true);
     /// Appends a corner; whether the control point exists is not checked. The texture coordinate's index is stored when
-    /// it is not negative and layer 0 has coordinates mapped by polygon vertex with indices. Without a polygon that was
-    /// begun nothing happens.
+    /// it is not negative and layer 0 has coordinates mapped by polygon vertex with indices. Without a polygon in
+    /// progress nothing happens.
     void AddPolygon(int pIndex, int pTextureUVIndex = -1);
-    /// Ends the polygon; one of fewer than three corners is kept.
+    /// Ends the polygon; one with fewer than three corners is kept.
     void EndPolygon();
 
     /// How many polygons there are.
@@ -61,33 +59,35 @@ public:
     /// The normal of layer 0 at a corner, as stored, when it is mapped by polygon vertex or by control point. False
     /// otherwise; the normal is untouched then.
     bool GetPolygonVertexNormal(int pPolyIndex, int pVertexIndex, FbxVector4& pNormal) const;
-    /// Where the corner's texture coordinate stands in the direct array of layer 0, when it is mapped by polygon
+    /// The index of the corner's texture coordinate in the direct array of layer 0, when it is mapped by polygon
     /// vertex; -1 otherwise.
     [[nodiscard]] int GetTextureUVIndex(int pPolygonIndex, int pPositionInPolygon,
                                         FbxLayerElement::EType pTypeIdentifier = FbxLayerElement::eTextureDiffuse);
 
-    /// Takes the polygon out, with what layers hold for it and its corners. Its former index, or -1 when there is none.
+    /// Removes the polygon, with the layers' entries for it and its corners. Its former index, or -1 when there is
+    /// none.
     int RemovePolygon(int pPolygonIndex);
     /// Whether every polygon has three corners; true without polygons.
     [[nodiscard]] bool IsTriangleMesh() const;
-    /// Makes room for so many polygons; the count stays.
+    /// Reserves capacity for that many polygons; the count stays.
     void ReservePolygonCount(int pCount);
-    /// Makes room for so many corners; the count stays.
+    /// Reserves capacity for that many corners; the count stays.
     void ReservePolygonVertexCount(int pCount);
 
-    /// Of the corners in the file, those that named points that there are not: they are at point 0 or, in a mesh
-    /// without points, left out. 0 for a mesh that is not from a file.
+    /// Of the corners in the file, those that referred to missing points: they are moved to point 0 or, in a mesh
+    /// without points, dropped. 0 for a mesh that is not from a file.
     [[nodiscard]] int GetRepairedCornerCount() const {
         ensureLoaded();
         return mRepairedCorners;
     }
 
-    /// The platform's own view: the polygons as they are, without asking the file.
+    /// The platform's own view: the polygons in memory, without reading the file.
     [[nodiscard]] detail::PlainArray<int>& polygonVertices() { return mPolygonVertices; }
     /// Where each polygon begins among the corners.
     [[nodiscard]] detail::PlainArray<int>& polygonStarts() { return mPolygonStarts; }
-    /// What elements mapped by edge count: for each edge the place in the polygon vertex array where it starts. Empty
-    /// unless a file had them, and from the first change of polygons on. Read from the file when first asked for.
+    /// What elements mapped by edge are indexed by: for each edge the position in the polygon vertex array where it
+    /// starts. Empty unless a file had them, and after the first change of polygons. Read from the file on the first
+    /// access.
     [[nodiscard]] detail::PlainArray<int>& edges();
 
 protected:
@@ -99,7 +99,7 @@ private:
         return next < mPolygonStarts.count() ? mPolygonStarts[next] : mPolygonVertices.count();
     }
     FBXSDK_LOCAL void dropEdges();
-    /// The corner's place in the polygon vertex array; -1 out of range.
+    /// The corner's position in the polygon vertex array; -1 out of range.
     [[nodiscard]] int cornerOf(int pPolygonIndex, int pPositionInPolygon) const {
         const bool inRange = pPositionInPolygon >= 0 && pPositionInPolygon < GetPolygonSize(pPolygonIndex);
         return inRange ? mPolygonStarts[pPolygonIndex] + pPositionInPolygon : -1;

@@ -31,15 +31,15 @@ struct NodePivots;
 enum class PivotVector : unsigned char;
 } // namespace detail
 
-/// A node of the scene's tree: a transform, children, attributes (what the node shows) and materials.
+/// A node of the scene's tree: a transform, children, attributes (cameras, lights, geometry, …) and materials.
 ///
 /// Children, attributes and materials are the node's source objects of those classes, in order of connection. A node
-/// has at most one parent and is never below itself: a connection that would make it so is cut again at once, and a
-/// node that is connected to a second parent leaves the first.
+/// has at most one parent and is never its own descendant: a connection that would make it one is removed at once, and
+/// a node that is connected to a second parent leaves the first.
 ///
 /// Angles are degrees; lengths are units of the scene (FbxGlobalSettings::GetSystemUnit). Vectors of pivots come as (x,
 /// y, z, 1), and the w of what is set is ignored; a reference to one is valid until the same vector of the node is
-/// asked for again.
+/// read again.
 class FBXSDK_DLL FbxNode : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxNode, FbxObject)
 
@@ -47,15 +47,15 @@ public:
     /// How the node is drawn; stored and written, of no effect on anything else.
     enum EShadingMode {
         eHardShading,    ///< the default
-        eWireFrame,      ///< edges alone
+        eWireFrame,      ///< edges only
         eFlatShading,    ///< one shade for each polygon
         eLightShading,   ///< lit, without textures
         eTextureShading, ///< lit, with textures
-        eFullShading     ///< all that the application can do
+        eFullShading     ///< everything that the application can render
     };
-    /// The source set is what files hold and what is evaluated; the destination set is stored in memory and no more.
+    /// The source set is what files hold and what is evaluated; the destination set is only stored in memory.
     enum EPivotSet {
-        eSourcePivot,     ///< the set in force
+        eSourcePivot,     ///< the set that is evaluated
         eDestinationPivot ///< a second set for conversions by hosts
     };
 
@@ -67,28 +67,28 @@ public:
     // Hierarchy.
 
     /// Appends the node, which leaves its former parent and keeps its local transform; a node that is a child already
-    /// keeps its place. In a scene, what was in none joins the scene. False for null, the node itself and its
+    /// keeps its position. In a scene, objects that are in none join the scene. False for null, the node itself and its
     /// ancestors.
     bool AddChild(FbxNode* pNode);
-    /// Takes the node from this one; it stays a member of the scene, without a parent. Returns the node, or null when
+    /// Removes the child from this node; it stays a member of the scene, unparented. Returns the node, or null when
     /// it is no child.
     FbxNode* RemoveChild(FbxNode* pNode);
-    /// Of direct children, or of everything below the node.
+    /// Of direct children, or of all descendants.
     [[nodiscard]] int GetChildCount(bool pRecursive = false) const;
-    /// The child at that place in order of connection; null out of range.
+    /// The child at that index in order of connection; null out of range.
     [[nodiscard]] FbxNode* GetChild(int pIndex);
     /// The same for a const node.
     [[nodiscard]] const FbxNode* GetChild(int pIndex) const;
-    [[nodiscard]] FbxNode* GetParent() { return mParent; } ///< Null for the root node and for a node without a parent.
+    [[nodiscard]] FbxNode* GetParent() { return mParent; } ///< Null for the root node and for an unparented node.
     [[nodiscard]] const FbxNode* GetParent() const { return mParent; } ///< The same for a const node.
-    /// The first node of the name below this one, each node before its children; among the children alone without
-    /// pRecursive. Null when there is none and for a null name. Names have no history here: the initial name is the
-    /// name.
+    /// The first descendant of that name, each node before its children; among the children only without
+    /// pRecursive. Null when there is none and for a null name. Renaming is not recorded: the initial name is the
+    /// current name.
     [[nodiscard]] FbxNode* FindChild(const char* pName, bool pRecursive = true, bool pInitial = false);
 
     // Attributes.
 
-    /// Makes the attribute the default one and disconnects the one that was, which is returned (null when there was
+    /// Makes the attribute the default one and disconnects the previous one, which is returned (null when there was
     /// none) and still belongs to its manager and scene. Null only removes.
     FbxNodeAttribute* SetNodeAttribute(FbxNodeAttribute* pNodeAttribute);
     /// The default attribute: that of the property DefaultAttributeIndex when it names one, else the first. Null
@@ -96,8 +96,8 @@ public:
     [[nodiscard]] FbxNodeAttribute* GetNodeAttribute();
     /// The same for a const node.
     [[nodiscard]] const FbxNodeAttribute* GetNodeAttribute() const;
-    [[nodiscard]] int GetNodeAttributeCount() const; ///< Mostly none or one.
-    /// The attribute at that place in order of connection; null out of range.
+    [[nodiscard]] int GetNodeAttributeCount() const; ///< Usually none or one.
+    /// The attribute at that index in order of connection; null out of range.
     [[nodiscard]] FbxNodeAttribute* GetNodeAttributeByIndex(int pIndex);
     /// The same for a const node.
     [[nodiscard]] const FbxNodeAttribute* GetNodeAttributeByIndex(int pIndex) const;
@@ -117,11 +117,11 @@ public:
     /// The default attribute when it is geometry of any kind, else null.
     [[nodiscard]] FbxGeometry* GetGeometry();
 
-    /// Makes the node the one that this node's X axis points at, in place of any other; null removes it. Stored and
-    /// written; evaluation does not follow it.
+    /// Sets the node that this node's X axis points at, replacing any other; null removes it. Stored and
+    /// written, but ignored by evaluation.
     void SetTarget(FbxNode* pNode);
     [[nodiscard]] FbxNode* GetTarget() const; ///< Null when there is none.
-    /// Makes the node the one that this node's up vector points at; otherwise as SetTarget.
+    /// Sets the node that this node's up vector points at; otherwise as SetTarget.
     void SetTargetUp(FbxNode* pNode);
     [[nodiscard]] FbxNode* GetTargetUp() const; ///< Null when there is none.
 
@@ -130,39 +130,39 @@ public:
 
     // Materials.
 
-    /// Connects the material behind those that there are. The material's index, also when it is there already; -1 for
+    /// Appends the material to the connections. The material's index, also when it is connected already; -1 for
     /// null.
     int AddMaterial(FbxSurfaceMaterial* pMaterial);
-    [[nodiscard]] int GetMaterialCount() const; ///< How many materials layer elements of materials can point at.
-    /// The material at that place in order of connection; null out of range.
+    [[nodiscard]] int GetMaterialCount() const; ///< How many materials layer elements can refer to.
+    /// The material at that index in order of connection; null out of range.
     [[nodiscard]] FbxSurfaceMaterial* GetMaterial(int pIndex) const;
 
     // Transform.
 
-    /// The order in which the angles of LclRotation are applied; in force when rotation is active.
+    /// The order in which the angles of LclRotation are applied; used when rotation is active.
     void SetRotationOrder(EPivotSet pPivotSet, EFbxRotationOrder pRotationOrder);
-    /// Sets pRotationOrder to the order that is stored, in force or not. A number from a file that is no order counts
+    /// Sets pRotationOrder to the stored order, whether it is used or not. A number from a file that is no order counts
     /// as XYZ.
     void GetRotationOrder(EPivotSet pPivotSet, EFbxRotationOrder& pRotationOrder) const;
-    /// Whether rotation order, pre- and post-rotation and rotation limits are in force; false by default. Both sets
+    /// Whether rotation order, pre- and post-rotation and rotation limits are used; false by default. Both sets
     /// share it.
     void SetRotationActive(bool pVal);
-    [[nodiscard]] bool GetRotationActive() const; ///< Whether they are in force.
-    /// With true, rotation order, pre- and post-rotation serve the limits alone and do not turn the node.
+    [[nodiscard]] bool GetRotationActive() const; ///< Whether they are used.
+    /// With true, rotation order, pre- and post-rotation apply to the limits only and do not rotate the node.
     void SetRotationSpaceForLimitOnly(EPivotSet pPivotSet, bool pUseForLimitOnly);
     [[nodiscard]] bool GetRotationSpaceForLimitOnly(EPivotSet pPivotSet) const; ///< False by default.
-    /// Turns the node after its own rotation: degrees, always applied X, Y, Z. In force when rotation is active.
+    /// Rotates the node after its own rotation: degrees, always applied X, Y, Z. Used when rotation is active.
     void SetPreRotation(EPivotSet pPivotSet, FbxVector4 pVector);
     [[nodiscard]] const FbxVector4& GetPreRotation(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
-    /// Its inverse turns the node before its own rotation: degrees, always applied X, Y, Z. In force when rotation is
+    /// Its inverse rotates the node before its own rotation: degrees, always applied X, Y, Z. Used when rotation is
     /// active.
     void SetPostRotation(EPivotSet pPivotSet, FbxVector4 pVector);
     [[nodiscard]] const FbxVector4& GetPostRotation(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
-    /// Added to the translation, outside of the rotation about the pivot; applications keep a node in place with it
-    /// when they move its pivot. Scene units.
+    /// Added to the translation, outside of the rotation about the pivot; applications use it to keep a node in place
+    /// when its pivot is moved. Scene units.
     void SetRotationOffset(EPivotSet pPivotSet, FbxVector4 pVector);
     [[nodiscard]] const FbxVector4& GetRotationOffset(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
-    /// The point about which the node turns, scene units.
+    /// The point about which the node rotates, scene units.
     void SetRotationPivot(EPivotSet pPivotSet, FbxVector4 pVector);
     [[nodiscard]] const FbxVector4& GetRotationPivot(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
     /// Added inside of the rotation and outside of the scaling about the pivot; the counterpart of the rotation offset.
@@ -173,37 +173,37 @@ public:
     void SetScalingPivot(EPivotSet pPivotSet, FbxVector4 pVector);
     [[nodiscard]] const FbxVector4& GetScalingPivot(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
 
-    /// Moves the node's attributes only: children do not inherit it, and the transform matrices do not contain it.
+    /// Moves the node's attributes only: children do not inherit it, and the transform matrices exclude it.
     /// Scene units.
     void SetGeometricTranslation(EPivotSet pPivotSet, FbxVector4 pVector);
     [[nodiscard]] FbxVector4 GetGeometricTranslation(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
-    /// Turns the node's attributes only: degrees, applied X, Y, Z.
+    /// Rotates the node's attributes only: degrees, applied X, Y, Z.
     void SetGeometricRotation(EPivotSet pPivotSet, FbxVector4 pVector);
     [[nodiscard]] FbxVector4 GetGeometricRotation(EPivotSet pPivotSet) const; ///< (0, 0, 0, 1) by default.
     /// Scales the node's attributes only.
     void SetGeometricScaling(EPivotSet pPivotSet, FbxVector4 pVector);
     [[nodiscard]] FbxVector4 GetGeometricScaling(EPivotSet pPivotSet) const; ///< (1, 1, 1, 1) by default.
 
-    /// How the parent's scaling is taken over; eInheritRrSs by default.
+    /// How the parent's scaling is inherited; eInheritRrSs by default.
     void SetTransformationInheritType(FbxTransform::EInheritType pInheritType);
-    /// Sets pInheritType to what is stored. A number from a file that is no inherit type counts as eInheritRrSs.
+    /// Sets pInheritType to the stored type. A number from a file that is no inherit type counts as eInheritRrSs.
     void GetTransformationInheritType(FbxTransform::EInheritType& pInheritType) const;
 
     // Evaluation.
 
-    /// The node's transform in the world at a time: that of all layers of the scene's current stack, the static one at
-    /// FBXSDK_TIME_INFINITE and outside of scenes. All changes are seen. The matrix is the node's own and valid until
-    /// it is evaluated again. The last three arguments have no effect: the source pivots count, and targets are not
-    /// followed.
+    /// The node's global transform at a time: that of all layers of the scene's current stack, the static one at
+    /// FBXSDK_TIME_INFINITE and outside of scenes. All changes take effect. The matrix is owned by the node and valid
+    /// until it is evaluated again. The last three arguments have no effect: the source pivots are used, and targets
+    /// are ignored.
     FbxAMatrix& EvaluateGlobalTransform(FbxTime pTime = FBXSDK_TIME_INFINITE,
                                         FbxNode::EPivotSet pPivotSet = FbxNode::eSourcePivot, bool pApplyTarget = false,
                                         bool pForceEval = false);
-    /// The node's transform relative to its parent at a time: translation, pivots, rotation and scaling in one, without
-    /// the geometric transform. Otherwise the same, in a matrix of its own.
+    /// The node's transform relative to its parent at a time: translation, pivots, rotation and scaling combined,
+    /// without the geometric transform. Otherwise the same, in a separate matrix.
     FbxAMatrix& EvaluateLocalTransform(FbxTime pTime = FBXSDK_TIME_INFINITE,
                                        FbxNode::EPivotSet pPivotSet = FbxNode::eSourcePivot, bool pApplyTarget = false,
                                        bool pForceEval = false);
-    /// Widens the interval by the keys of the node, its attributes, their shape channels and everything below it, on
+    /// Widens the interval by the keys of the node, its attributes, their shape channels and all descendants, on
     /// one layer of the stack (null: the scene's current one). False, and nothing changed, when there are no keys or no
     /// such layer.
     bool GetAnimationInterval(FbxTimeSpan& pInterval, FbxAnimStack* pAnimStack = nullptr, int pAnimLayerId = 0);
@@ -212,7 +212,7 @@ public:
     [[nodiscard]] detail::NodeEvaluation& evaluation();
 
 protected:
-    /// Keeps parent, children, attributes and materials in step with the connections.
+    /// Keeps parent, children, attributes and materials consistent with the connections.
     FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:
@@ -229,8 +229,8 @@ private:
     std::vector<FbxNodeAttribute*> mAttributes;
     std::vector<FbxSurfaceMaterial*> mMaterials;
     EShadingMode mShadingMode = eHardShading;
-    mutable std::unique_ptr<detail::NodePivots> mPivots; ///< made on first use
-    std::unique_ptr<detail::NodeEvaluation> mEvaluation; ///< made on first use
+    mutable std::unique_ptr<detail::NodePivots> mPivots; ///< created on first use
+    std::unique_ptr<detail::NodeEvaluation> mEvaluation; ///< created on first use
 };
 
 FBXSDK_NAMESPACE_END

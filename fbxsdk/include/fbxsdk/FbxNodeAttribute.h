@@ -10,8 +10,8 @@ FBXSDK_NAMESPACE_BEGIN
 
 class FbxNode;
 
-/// The base of what nodes carry: cameras, lights, geometry, … One attribute may belong to several nodes. Also the class
-/// of attributes of a kind that the platform has no class for; their properties are kept.
+/// The base of node attributes: cameras, lights, geometry, … One attribute may belong to several nodes. Also the class
+/// of attributes of a kind without a class in the platform; their properties are kept.
 class FBXSDK_DLL FbxNodeAttribute : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxNodeAttribute, FbxObject)
 
@@ -45,17 +45,17 @@ public:
     static const char* const sColor;       ///< The name of the property Color.
     static const FbxDouble3 sDefaultColor; ///< (0.8, 0.8, 0.8); lights have (1, 1, 1).
 
-    FbxPropertyT<FbxDouble3> Color; ///< red, green, blue, 0 to 1; for display, of lights their colour
+    FbxPropertyT<FbxDouble3> Color; ///< red, green, blue, 0 to 1; for display; of lights their colour
 
     [[nodiscard]] virtual EType GetAttributeType() const; ///< eUnknown for an attribute without a class of its own.
 
-    /// How many nodes carry the attribute; more than one for instances.
+    /// How many nodes have the attribute; more than one for instances.
     [[nodiscard]] int GetNodeCount() const;
-    /// The node at that place in order of connection; null out of range.
+    /// The node at that index in order of connection; null out of range.
     [[nodiscard]] FbxNode* GetNode(int pIndex = 0) const;
 
 protected:
-    /// Keeps the list of nodes in step with the connections.
+    /// Keeps the list of nodes consistent with the connections.
     FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:

@@ -6,7 +6,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// An empty object, used as a parent or as a place; drawn as a cross or not at all.
+/// An empty object, used as a parent or as a locator; drawn as a cross or not at all.
 class FBXSDK_DLL FbxNull : public FbxNodeAttribute {
     FBXSDK_OBJECT_DECLARE(FbxNull, FbxNodeAttribute)
 

@@ -6,7 +6,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A NURBS surface as older programs write it; FbxGeometryConverter makes meshes of it.
+/// A NURBS surface as older programs write it; FbxGeometryConverter converts it to a mesh.
 class FBXSDK_DLL FbxNurbs : public FbxNurbsSurfaceBase {
     FBXSDK_OBJECT_DECLARE(FbxNurbs, FbxGeometry)
 

@@ -14,7 +14,7 @@ class FBXSDK_DLL FbxNurbsCurve : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxNurbsCurve, FbxGeometry)
 
 public:
-    /// In which space the points lie.
+    /// The space of the points.
     enum EDimension {
         e2D = 2, ///< in the parameters of a surface, for trimming
         e3D = 3  ///< in space; the default
@@ -22,20 +22,20 @@ public:
     /// How the curve ends.
     enum EType {
         eOpen,    ///< at its last points; the default
-        eClosed,  ///< where it began
-        ePeriodic ///< where it began, without a corner
+        eClosed,  ///< at its first points
+        ePeriodic ///< at its first points, without a corner
     };
 
     [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eNurbsCurve.
 
     using FbxGeometry::InitControlPoints;
-    /// Sizes points and knots, which become zero; no knots when the order does not fit the count. To be called after
+    /// Sizes points and knots, which become zero; no knots when the order does not match the count. To be called after
     /// SetOrder.
     void InitControlPoints(int pCount, EType pVType);
     void SetOrder(int pOrder);              ///< The degree plus one; points and knots stay.
     [[nodiscard]] int GetOrder() const;     ///< 4 by default.
     [[nodiscard]] EType GetType() const;    ///< eOpen by default.
-    [[nodiscard]] int GetKnotCount() const; ///< 0 until points are made.
+    [[nodiscard]] int GetKnotCount() const; ///< 0 until points are created.
     /// The knots, ascending; writing to them changes the curve. Null when there are none; valid until their number
     /// changes.
     [[nodiscard]] double* GetKnotVector() const;
@@ -43,19 +43,19 @@ public:
     [[nodiscard]] int GetStep() const;             ///< 4 by default.
     void SetDimension(EDimension pDimension);      ///< The third coordinate of 2D curves is of no effect.
     [[nodiscard]] EDimension GetDimension() const; ///< e3D by default.
-    /// Whether the weights count, as the file says; false for curves made in memory.
+    /// Whether the weights are used, as the file states; false for curves created in memory.
     [[nodiscard]] bool IsRational() const;
 
-    /// What the curve consists of beside its points.
+    /// The data of the curve besides its points.
     struct Content {
         int order = 4;              ///< the degree plus one
         int step = 4;               ///< subdivisions of each span
         EType type = eOpen;         ///< how it ends
         EDimension dimension = e3D; ///< in which space
-        bool rational = false;      ///< whether the weights count
+        bool rational = false;      ///< whether the weights are used
         std::vector<double> knots;  ///< ascending
     };
-    /// The platform's own view: as it is, without asking the file.
+    /// The platform's own view: the data in memory, without reading the file.
     [[nodiscard]] Content& content() { return mContent; }
 
 protected:

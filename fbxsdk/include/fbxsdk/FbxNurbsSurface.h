@@ -8,20 +8,20 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// What both classes of NURBS surfaces consist of. U runs fastest through the control points; their w is the weight and
-/// not multiplied into x, y, z.
+/// The common part of both classes of NURBS surfaces. U runs fastest through the control points; their w is the weight
+/// and not multiplied into x, y, z.
 ///
 /// A direction of n control points and a given order has, by its type, this many knots: open n + order, closed
-/// n + order + 1 (the first point comes again), periodic n + 2 order - 1 (the first order - 1 points come again).
+/// n + order + 1 (the first point is repeated), periodic n + 2 order - 1 (the first order - 1 points are repeated).
 class FBXSDK_DLL FbxNurbsSurfaceBase : public FbxGeometry {
 public:
     /// How a direction ends.
     enum EType {
-        ePeriodic, ///< where it began, without an edge
-        eClosed,   ///< where it began
+        ePeriodic, ///< at its first points, without an edge
+        eClosed,   ///< at its first points
         eOpen      ///< at its last points; the default
     };
-    /// How finely applications draw the surface; kept in memory, not in files.
+    /// The level of detail at which applications draw the surface; kept in memory, not in files.
     enum ESurfaceMode {
         eRaw,           ///< its control points
         eLowNoNormals,  ///< coarsely, without normals
@@ -31,7 +31,7 @@ public:
     };
 
     using FbxGeometry::InitControlPoints;
-    /// Sizes points and knots, which become zero; no knots in a direction whose order does not fit its count. To be
+    /// Sizes points and knots, which become zero; no knots in a direction whose order does not match its count. To be
     /// called after SetOrder.
     void InitControlPoints(int pUCount, EType pUType, int pVCount, EType pVType);
     [[nodiscard]] int GetUCount() const { return direction(0).count; }      ///< Control points along u.
@@ -44,16 +44,16 @@ public:
     [[nodiscard]] int GetUOrder() const { return direction(0).order; } ///< 4 by default.
     [[nodiscard]] int GetVOrder() const { return direction(1).order; } ///< 4 by default.
 
-    /// 0 until points are made.
+    /// 0 until points are created.
     [[nodiscard]] int GetUKnotCount() const { return static_cast<int>(direction(0).knots.size()); }
-    /// 0 until points are made.
+    /// 0 until points are created.
     [[nodiscard]] int GetVKnotCount() const { return static_cast<int>(direction(1).knots.size()); }
     /// The knots along u, ascending; writing to them changes the surface. Null when there are none; valid until their
     /// number changes.
     [[nodiscard]] double* GetUKnotVector() const { return knots(0); }
     [[nodiscard]] double* GetVKnotVector() const { return knots(1); } ///< The same along v.
-    /// How often each knot counts, in files of older writers; null elsewhere. The knot vectors have every knot as often
-    /// as it counts, whatever the file does.
+    /// The multiplicity of each knot, in files of older writers; null elsewhere. The knot vectors repeat every knot by
+    /// its multiplicity, whatever the file does.
     [[nodiscard]] int* GetUMultiplicityVector() const { return multiplicity(0); }
     [[nodiscard]] int* GetVMultiplicityVector() const { return multiplicity(1); } ///< The same along v.
 
@@ -78,7 +78,7 @@ public:
         std::vector<double> knots;     ///< ascending
         std::vector<int> multiplicity; ///< as in files of older writers, else empty
     };
-    /// The platform's own view: 0 is U, 1 is V; as it is, without asking the file.
+    /// The platform's own view: 0 is U, 1 is V; the data in memory, without reading the file.
     [[nodiscard]] Direction& parameters(int pDirection) { return mDirections[pDirection]; }
     [[nodiscard]] bool& flipNormals() { return mFlipNormals; } ///< The platform's own view of the flag.
 

@@ -34,12 +34,12 @@ struct FbxConnection {
         eContains = 1 << 3,              ///< the destination contains the source
         eData = 1 << 4,                  ///< carries a value
         eLinkType = 1 << 5,              ///< the mask of the kinds that say what a connection is for
-        eDefault = eUser,                ///< what a host makes when it says nothing
-        eUnidirectional = 1 << 6         ///< known to the source alone
+        eDefault = eUser,                ///< used when a host does not specify a kind
+        eUnidirectional = 1 << 6         ///< visible to the source only
     };
 };
 
-/// What every class of objects declares: identity and the two factories.
+/// The declarations common to all object classes: identity and the two factories.
 ///
 /// With a manager the new object belongs to the manager alone; with a container it becomes a source of the container,
 /// hence a member of the container's scene. A null name is the empty name; names need not be unique. Null when the
@@ -77,10 +77,9 @@ protected:                                                                      
 private:                                                                                                               \
     friend class detail::ManagerData;
 
-/// The base of everything that a manager owns: a class, a name, properties, connections and the scene it is a member
-/// of.
+/// The base of everything that a manager owns: a class, a name, properties, connections and its scene.
 ///
-/// Objects live until their manager is destroyed or Destroy is called; they are never deleted directly. A manager and
+/// Objects exist until their manager is destroyed or Destroy is called; they are never deleted directly. A manager and
 /// all of its objects are used by one thread at a time.
 class FBXSDK_DLL FbxObject {
 public:
@@ -99,8 +98,8 @@ public:
     FbxObject& operator=(const FbxObject&) = delete;
 
     /// Disconnects the object from everything and frees it; with pRecursive also its source objects, and theirs. A
-    /// scene takes its members along. A scene's root node and global settings stay: they go with the scene only. All
-    /// pointers and properties of what was freed are invalid afterwards.
+    /// scene frees its members as well. A scene's root node and global settings stay: they are freed with the scene
+    /// only. All pointers and properties of what was freed are invalid afterwards.
     void Destroy(bool pRecursive = false);
 
     /// The class the object was created as.
@@ -122,8 +121,8 @@ public:
     /// The same scene as a document.
     [[nodiscard]] FbxDocument* GetDocument() const;
 
-    /// The property of that name; one in a compound is named with the names of its compounds, "Compound|Name". Without
-    /// regard to case ASCII letters alone are equal. An invalid property for null and when there is none; of several of
+    /// The property of that name; one in a compound has a hierarchical name, "Compound|Name". Case is ignored
+    /// for ASCII letters only. An invalid property for null and when there is none; of several of
     /// one name the first.
     [[nodiscard]] FbxProperty FindProperty(const char* pName, bool pCaseSensitive = true) const;
     /// The same; invalid also when the property of that name has another data type.
@@ -138,22 +137,22 @@ public:
 
     // Connections.
 
-    /// Makes the other object a source (an input or a child) of this one, behind those that there are. In a scene, what
-    /// is in none joins the scene with everything that feeds it.
+    /// Makes the other object a source (an input or a child) of this one, as the last one. In a scene, an object
+    /// that is in none joins the scene with all of its sources.
     ///
     /// False, and nothing changes, for null, when the two are connected already, for the object itself, for an object
     /// of another manager, and where the classes do not allow it (a node below itself).
     bool ConnectSrcObject(FbxObject* pObject, FbxConnection::EType pType = FbxConnection::eNone);
-    /// The same the other way round: makes this object a source of the other one.
+    /// The reverse: makes this object a source of the other one.
     bool ConnectDstObject(FbxObject* pObject, FbxConnection::EType pType = FbxConnection::eNone);
     /// Whether the other object is a source of this one; false for null.
     [[nodiscard]] bool IsConnectedSrcObject(const FbxObject* pObject) const;
     /// Whether this object is a source of the other one; false for null.
     [[nodiscard]] bool IsConnectedDstObject(const FbxObject* pObject) const;
-    /// Cuts the connection from the source. Cut from its scene, an object is no longer a member. False when there is no
-    /// such connection and for what a scene always has.
+    /// Removes the connection from the source. Disconnected from its scene, an object is no longer a member. False when
+    /// there is no such connection and for the permanent members of a scene.
     bool DisconnectSrcObject(FbxObject* pObject);
-    /// Cuts the connection to the destination, otherwise as DisconnectSrcObject.
+    /// Removes the connection to the destination, otherwise as DisconnectSrcObject.
     bool DisconnectDstObject(FbxObject* pObject);
     /// Makes the property a source of this object. False for an invalid property, and otherwise as ConnectSrcObject.
     bool ConnectSrcProperty(const FbxProperty& pProperty);
@@ -164,16 +163,16 @@ public:
     [[nodiscard]] int GetSrcObjectCount() const;
     /// How many of the source objects meet the criterion.
     [[nodiscard]] int GetSrcObjectCount(const FbxCriteria& pCriteria) const;
-    /// The source object at that place in order of connection; null out of range.
+    /// The source object at that index in order of connection; null out of range.
     [[nodiscard]] FbxObject* GetSrcObject(int pIndex = 0) const;
-    /// The source object at that place among those that meet the criterion; null out of range.
+    /// The source object at that index among those that meet the criterion; null out of range.
     [[nodiscard]] FbxObject* GetSrcObject(const FbxCriteria& pCriteria, int pIndex = 0) const;
     /// How many of the source objects are a T.
     template <class T>
     [[nodiscard]] int GetSrcObjectCount() const {
         return GetSrcObjectCount(FbxCriteria::ObjectType(T::ClassId));
     }
-    /// The source object at that place among those that are a T; null out of range.
+    /// The source object at that index among those that are a T; null out of range.
     template <class T>
     [[nodiscard]] T* GetSrcObject(int pIndex = 0) const {
         return static_cast<T*>(GetSrcObject(FbxCriteria::ObjectType(T::ClassId), pIndex));
@@ -182,16 +181,16 @@ public:
     [[nodiscard]] int GetDstObjectCount() const;
     /// How many of the destination objects meet the criterion.
     [[nodiscard]] int GetDstObjectCount(const FbxCriteria& pCriteria) const;
-    /// The destination object at that place in order of connection; null out of range.
+    /// The destination object at that index in order of connection; null out of range.
     [[nodiscard]] FbxObject* GetDstObject(int pIndex = 0) const;
-    /// The destination object at that place among those that meet the criterion; null out of range.
+    /// The destination object at that index among those that meet the criterion; null out of range.
     [[nodiscard]] FbxObject* GetDstObject(const FbxCriteria& pCriteria, int pIndex = 0) const;
     /// How many of the destination objects are a T.
     template <class T>
     [[nodiscard]] int GetDstObjectCount() const {
         return GetDstObjectCount(FbxCriteria::ObjectType(T::ClassId));
     }
-    /// The destination object at that place among those that are a T; null out of range.
+    /// The destination object at that index among those that are a T; null out of range.
     template <class T>
     [[nodiscard]] T* GetDstObject(int pIndex = 0) const {
         return static_cast<T*>(GetDstObject(FbxCriteria::ObjectType(T::ClassId), pIndex));
@@ -209,13 +208,13 @@ public:
     [[nodiscard]] detail::ObjectData& data() const { return *mData; }
 
 protected:
-    /// Enters the object into the manager's list; for the factories.
+    /// Adds the object to the manager's list; for the factories.
     FBXSDK_LOCAL FbxObject(FbxManager& pManager, const detail::ClassInfo& pInfo);
-    /// Takes the object out of the manager's list.
+    /// Removes the object from the manager's list.
     FBXSDK_LOCAL virtual ~FbxObject();
 
-    /// Called on both ends after a connection between objects was made or cut, before the call that did it returns.
-    /// `pSource` becomes (or was) a source of `pDestination`; one of the two is this object.
+    /// Called on both ends after a connection between objects was added or removed, before the call that did it
+    /// returns. `pSource` becomes (or was) a source of `pDestination`; one of the two is this object.
     FBXSDK_LOCAL virtual void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected);
     /// Called when the object becomes a member of a scene (or leaves it: null).
     FBXSDK_LOCAL virtual void sceneChanged(FbxScene* pScene);

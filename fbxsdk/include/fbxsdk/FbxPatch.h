@@ -6,7 +6,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A surface of spline patches; FbxGeometryConverter makes meshes of it. U runs fastest through the control points.
+/// A surface of spline patches; FbxGeometryConverter converts it to a mesh. U runs fastest through the control points.
 class FBXSDK_DLL FbxPatch : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxPatch, FbxGeometry)
 
@@ -35,7 +35,7 @@ public:
     [[nodiscard]] int GetUStep() const { return direction(0).step; } ///< 4 by default.
     [[nodiscard]] int GetVStep() const { return direction(1).step; } ///< 4 by default.
 
-    /// A closed direction runs on from its last control points to its first.
+    /// A closed direction continues from its last control points to its first.
     void SetClosed(bool pU, bool pV);
     [[nodiscard]] bool GetUClosed() const { return direction(0).closed; } ///< False by default.
     [[nodiscard]] bool GetVClosed() const { return direction(1).closed; } ///< False by default.
@@ -52,11 +52,11 @@ public:
         int count = 0;             ///< control points
         int step = 4;              ///< subdivisions of each segment
         EType type = eBezier;      ///< its splines
-        bool closed = false;       ///< whether it runs on to its first points
-        bool cappedBottom = false; ///< whether its beginning is filled
+        bool closed = false;       ///< whether it continues to its first points
+        bool cappedBottom = false; ///< whether its start is filled
         bool cappedTop = false;    ///< whether its end is filled
     };
-    /// The platform's own view: 0 is U, 1 is V; as it is, without asking the file.
+    /// The platform's own view: 0 is U, 1 is V; the data in memory, without reading the file.
     [[nodiscard]] Direction& parameters(int pDirection) { return mDirections[pDirection]; }
 
 protected:

@@ -25,27 +25,27 @@ public:
     /// Whether the folder exists.
     [[nodiscard]] static bool Exist(const char* pFolderPathUTF8);
     /// Creates the folder and every missing parent. True also when it exists already; false when it cannot be created
-    /// or something that is no folder has the name.
+    /// or something other than a folder has the name.
     static bool Create(const char* pFolderPathUTF8);
-    /// Deletes an empty folder; false when there is none or something is in it.
+    /// Deletes an empty folder; false when there is none or it is not empty.
     static bool Delete(const char* pFolderPathUTF8);
-    /// Whether the folder exists and has nothing in it.
+    /// Whether the folder exists and is empty.
     [[nodiscard]] static bool IsEmpty(const char* pFolderPathUTF8);
 
-    /// Whether it begins neither with a separator nor with a drive.
+    /// Whether it starts neither with a separator nor with a drive.
     [[nodiscard]] static bool IsRelative(const char* pPath);
-    /// The folder as seen from the root folder, "." when they are the same.
+    /// The folder relative to the root folder, "." when they are the same.
     ///
-    /// Relative arguments are taken from the current directory. On another drive or server: the absolute path.
+    /// Relative arguments are resolved against the current directory. On another drive or server: the absolute path.
     [[nodiscard]] static FbxString GetRelativePath(const char* pRootPath, const char* pNewPath);
-    /// The file as seen from the root folder. Otherwise as GetRelativePath.
+    /// The file relative to the root folder. Otherwise as GetRelativePath.
     [[nodiscard]] static FbxString GetRelativeFilePath(const char* pRootPath, const char* pNewFilePath);
     /// The absolute, cleaned path, from the current directory. Nothing needs to exist.
     [[nodiscard]] static FbxString Resolve(const char* pRelPath);
     /// One kind of separator, none repeated or trailing, no "." and no ".." behind a component; "." alone
-    /// when nothing else is left. Does not look at the file system.
+    /// when nothing else is left. Does not access the file system.
     [[nodiscard]] static FbxString Clean(const char* pPath);
-    /// A path in the folder, beginning with the prefix, at which nothing exists yet.
+    /// A path in the folder, starting with the prefix, at which nothing exists yet.
     [[nodiscard]] static FbxString GenerateFileName(const char* pFolder, const char* pPrefix);
 };
 

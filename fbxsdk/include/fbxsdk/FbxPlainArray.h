@@ -1,12 +1,12 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The memory of geometry: contiguous items of plain types that can grow without being initialised, so that a file's
+// The arrays of geometry: contiguous items of plain types that can grow without being initialised, so that a file's
 // numbers are decoded straight into place.
 //
-// Arrays are lazy: an array of a file has a source in place of items until an item or their number is asked for. Items
-// that the file holds in the layout of memory, compressed or not, stay with the source even then, as long as only their
-// values are asked for.
+// Arrays are lazy: an array of a file has a source instead of items until an item or their number is accessed. Items
+// that the file stores in their layout in memory, compressed or not, stay in the source even then, as long as only
+// their values are read.
 #pragma once
 
 #include <algorithm>
@@ -27,9 +27,9 @@ inline constexpr std::size_t kStoredBytes = sizeof(T);
 template <>
 inline constexpr std::size_t kStoredBytes<FbxVector4> = 3 * sizeof(double);
 
-/// Where the items of an array are until they are in memory. Shown items are accessed through a sliding window.
+/// The source of the items of an array until they are in memory. Shown items are accessed through a sliding window.
 ///
-/// Functions that read throw when the file was changed meanwhile, and std::bad_alloc. The source is as before then.
+/// Functions that read throw when the file has been changed, and std::bad_alloc. The source is unchanged then.
 class FBXSDK_DLL ItemSource {
 public:
     ItemSource() = default;
@@ -59,7 +59,7 @@ protected:
     int mWindowSize = 0;
 };
 
-/// Items of one size, given with every call; knows nothing of their type.
+/// Items of one size, passed to every call; independent of their type.
 class FBXSDK_DLL PlainStorage {
 public:
     PlainStorage();
@@ -80,7 +80,7 @@ public:
 
 protected:
     [[nodiscard]] void* items() const { return mItems; }
-    /// Whether the source shows the items; there is no other memory of them then.
+    /// Whether the source shows the items; they are not in memory then.
     [[nodiscard]] bool isShown() const {
         if (mSource && mCount == kUnread)
             open();
@@ -93,11 +93,11 @@ protected:
     }
     void clearItems();
 
-    /// Room for that many items. Throws std::bad_alloc when there is none; the items are untouched then.
+    /// Reserves capacity for that many items. Throws std::bad_alloc on failure; the items are untouched then.
     void reserveItems(int pCapacity, std::size_t pItemSize);
-    /// New items hold whatever was there.
+    /// New items are uninitialised.
     void resizeItems(int pCount, std::size_t pItemSize);
-    /// Moves the items from the index on up by one place, and returns that place.
+    /// Moves the items from the index on up by one, and returns the index.
     void* openSlot(int pIndex, std::size_t pItemSize);
     void closeSlots(int pIndex, int pCount, std::size_t pItemSize);
 
@@ -108,15 +108,15 @@ private:
     void readSource() const;
     void allocate(int pCapacity, std::size_t pItemSize) const;
 
-    // That items come out of the source is no change of the array.
+    // Reading the items from the source does not change the array's value.
     mutable std::unique_ptr<ItemSource> mSource;
     mutable void* mItems = nullptr;
     mutable int mCapacity = 0;
     mutable int mCount = 0;
 };
 
-/// A growing array of a plain type. Negative counts mean none; indices are the caller's to check. Whoever asks for more
-/// than values gets all items into memory first.
+/// A growing array of a plain type. Negative counts mean none; the caller checks indices. All accesses other than
+/// reading a value read all items into memory first.
 template <class T>
 class PlainArray : public PlainStorage {
     static_assert(std::is_trivially_copyable<T>::value, "items are moved as bytes");
@@ -142,7 +142,7 @@ public:
         resizeItems(pCount, kItemBytes);
     }
     void resize(int pCount, const T& pNewItem) {
-        const T item = pNewItem; // it may be one of ours
+        const T item = pNewItem; // the argument may be an item of this array
         const int first = count();
         resizeUninitialised(pCount);
         if (count() > first)

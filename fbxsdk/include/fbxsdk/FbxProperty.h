@@ -25,11 +25,11 @@ namespace detail {
 struct PropertyData;
 }
 
-/// What properties are marked with.
+/// The flags of properties.
 struct FbxPropertyFlags {
     /// Combinable bits. Files hold those for animatable, animated, user-defined, hidden, locked and muted.
     enum EFlags {
-        eNone = 0,            ///< no mark
+        eNone = 0,            ///< no flag
         eStatic = 1 << 0,     ///< declared by the class, not dynamic
         eAnimatable = 1 << 1, ///< meant to be animated; a curve can be made for other numeric properties too
         /// had a curve node when the file was written; written for what has one, whatever is set here
@@ -37,13 +37,13 @@ struct FbxPropertyFlags {
         eImported = 1 << 3,       ///< came from a file; never set here and never written
         eUserDefined = 1 << 4,    ///< added by a user or a host, shown as such by applications
         eHidden = 1 << 5,         ///< not shown by applications
-        eNotSavable = 1 << 6,     ///< left out of files
-        eLockedMember0 = 1 << 7,  ///< the first component may not be edited in applications; Set is not hindered
+        eNotSavable = 1 << 6,     ///< omitted from files
+        eLockedMember0 = 1 << 7,  ///< the first component may not be edited in applications; Set still works
         eLockedMember1 = 1 << 8,  ///< the same for the second component
         eLockedMember2 = 1 << 9,  ///< the same for the third component
         eLockedMember3 = 1 << 10, ///< the same for the fourth component
         eLockedAll = eLockedMember0 | eLockedMember1 | eLockedMember2 | eLockedMember3, ///< all four components
-        /// the animation of the first component is switched off in applications; evaluation here does not heed it
+        /// the animation of the first component is switched off in applications; evaluation here ignores it
         eMutedMember0 = 1 << 11,
         eMutedMember1 = 1 << 12,                                                  ///< the same for the second component
         eMutedMember2 = 1 << 13,                                                  ///< the same for the third component
@@ -78,13 +78,13 @@ constexpr EFbxType FbxTypeOf(const T&) {
 
 /// A handle to one typed, named value of an object. Copying the handle does not copy the value.
 ///
-/// A handle is valid until its object is destroyed; it does not keep the object alive and does not notice its end. A
-/// handle made without an object is invalid: reading from it gives T(), writing to it false, asking it for other
-/// properties invalid ones.
+/// A handle is valid until its object is destroyed; it does not keep the object alive and does not detect its end. A
+/// handle made without an object is invalid: reading from it gives T(), writing to it false, its related
+/// properties are invalid.
 class FBXSDK_DLL FbxProperty {
 public:
     /// Appends a dynamic property with the type's zero value to the object. With pCheckForDup an existing property of
-    /// that name is returned as it is and *pWasFound says so. The new one carries no flags. Invalid for a null object
+    /// that name is returned unchanged and *pWasFound is true. The new one has no flags. Invalid for a null object
     /// or name and for an undefined type.
     static FbxProperty Create(FbxObject* pObject, const FbxDataType& pDataType, const char* pName,
                               const char* pLabel = "", bool pCheckForDup = true, bool* pWasFound = nullptr);
@@ -105,13 +105,13 @@ public:
     [[nodiscard]] const char* GetNameAsCStr() const;
     /// The name with those of all compounds before it, separated by bars; what FbxObject::FindProperty takes.
     [[nodiscard]] FbxString GetHierarchicalName() const;
-    /// What applications show in place of the name. Without a label: the name, or the empty string when
+    /// The name that applications display. Without a label: the name, or the empty string when
     /// pReturnNameIfEmpty is false.
     [[nodiscard]] FbxString GetLabel(bool pReturnNameIfEmpty = true) const;
     [[nodiscard]] FbxDataType GetPropertyDataType() const; ///< An undefined type when the property is invalid.
 
-    /// The static value, never the animated one, converted to T where that makes sense; T() otherwise. Numbers convert
-    /// among each other (truncated toward zero, NaN to 0, too far ones to the nearest), vectors by components, times to
+    /// The static value, never the animated one, converted to T where that is possible; T() otherwise. Numbers convert
+    /// among each other (truncated toward zero, NaN to 0, clamped to the range), vectors by components, times to
     /// and from whole numbers as ticks; text only to text.
     template <class T>
     [[nodiscard]] T Get() const {
@@ -119,13 +119,13 @@ public:
         readValue(&value, FbxTypeOf(value));
         return value;
     }
-    /// Sets the static value, which curves do not follow. Converts as Get does; components that are not given stay.
+    /// Sets the static value, without changing curves. Converts as Get does; components that are not given stay.
     /// False when the property is invalid or no conversion exists.
     template <class T>
     bool Set(const T& pValue) {
         return writeValue(&pValue, FbxTypeOf(pValue));
     }
-    /// Text, null being the empty one. False for a property that holds no text.
+    /// Text, null meaning the empty one. False for a property that holds no text.
     bool Set(const char* pValue) { return Set(FbxString(pValue)); }
     /// The animated value at the time, over all layers of the scene's current stack; the static one at
     /// FBXSDK_TIME_INFINITE, outside of scenes and where nothing animates the property. Converts as Get does. The
@@ -148,7 +148,7 @@ public:
     /// the last form.
     FbxAnimCurve* GetCurve(FbxAnimLayer* pAnimLayer, const char* pChannel, bool pCreate = false);
     /// The curve of one component on one layer. With pCreate a missing curve node and curve are made; null for a null
-    /// layer, an unknown component, a name that is not the property's, and where one would have to be made for a
+    /// layer, an unknown component, a name that is not the property's, and where one would have to be created for a
     /// property that holds no number. The curve belongs to the manager.
     FbxAnimCurve* GetCurve(FbxAnimLayer* pAnimLayer, const char* pName, const char* pChannel, bool pCreate);
     /// The curve node on the first layer of the scene's current stack; null without a scene or a stack, and otherwise
@@ -156,10 +156,10 @@ public:
     FbxAnimCurveNode* GetCurveNode(bool pCreate = false);
     /// The curve node on the first layer of the stack; null without a layer, and otherwise as for a layer.
     FbxAnimCurveNode* GetCurveNode(FbxAnimStack* pAnimStack, bool pCreate = false);
-    /// The curve node through which the layer animates the property; null when there is none. With pCreate it is made,
-    /// except for properties that hold no number.
+    /// The curve node through which the layer animates the property; null when there is none. With pCreate it is
+    /// created, except for properties that hold no number.
     FbxAnimCurveNode* GetCurveNode(FbxAnimLayer* pAnimLayer, bool pCreate = false);
-    /// The layer's curve node, made when there is none; null for a null layer and a property that holds no number.
+    /// The layer's curve node, created when there is none; null for a null layer and a property that holds no number.
     FbxAnimCurveNode* CreateCurveNode(FbxAnimLayer* pAnimLayer);
     /// Whether a curve with keys animates the property on the layer (null: the first layer of the scene's current
     /// stack).
@@ -177,7 +177,7 @@ public:
     bool ConnectSrcObject(FbxObject* pObject);
     /// Makes the property a source of the object; false likewise.
     bool ConnectDstObject(FbxObject* pObject);
-    /// Cuts the connection from the object; false when there is none.
+    /// Removes the connection from the object; false when there is none.
     bool DisconnectSrcObject(FbxObject* pObject);
     /// Makes the other property a source of this one; false likewise.
     bool ConnectSrcProperty(const FbxProperty& pProperty);
@@ -189,16 +189,16 @@ public:
     [[nodiscard]] int GetSrcObjectCount() const;
     /// How many of them meet the criterion.
     [[nodiscard]] int GetSrcObjectCount(const FbxCriteria& pCriteria) const;
-    /// The source object at that place in order of connection; null out of range.
+    /// The source object at that index in order of connection; null out of range.
     [[nodiscard]] FbxObject* GetSrcObject(int pIndex = 0) const;
-    /// The source object at that place among those that meet the criterion; null out of range.
+    /// The source object at that index among those that meet the criterion; null out of range.
     [[nodiscard]] FbxObject* GetSrcObject(const FbxCriteria& pCriteria, int pIndex = 0) const;
     /// How many of the source objects are a T.
     template <class T>
     [[nodiscard]] int GetSrcObjectCount() const {
         return GetSrcObjectCount(FbxCriteria::ObjectType(T::ClassId));
     }
-    /// The source object at that place among those that are a T; null out of range.
+    /// The source object at that index among those that are a T; null out of range.
     template <class T>
     [[nodiscard]] T* GetSrcObject(int pIndex = 0) const {
         return static_cast<T*>(GetSrcObject(FbxCriteria::ObjectType(T::ClassId), pIndex));
@@ -208,7 +208,7 @@ public:
     [[nodiscard]] int GetSrcPropertyCount() const;                  ///< How many properties are sources of this one.
     [[nodiscard]] FbxProperty GetSrcProperty(int pIndex = 0) const; ///< In order of connection; invalid out of range.
 
-    /// Whether both are handles to the same property; the values do not matter.
+    /// Whether both are handles to the same property; values are not compared.
     bool operator==(const FbxProperty& pOther) const { return mObject == pOther.mObject && mIndex == pOther.mIndex; }
     /// The opposite.
     bool operator!=(const FbxProperty& pOther) const { return !(*this == pOther); }
@@ -220,9 +220,9 @@ public:
     [[nodiscard]] int index() const { return mIndex; }
 
 protected:
-    /// Stores the static value in a variable of that type; the variable stays as it is where no conversion exists.
+    /// Stores the static value in a variable of that type; the variable is unchanged where no conversion exists.
     void readValue(void* pValue, EFbxType pType) const;
-    /// Takes the static value from a variable of that type; false where no conversion exists.
+    /// Sets the static value from a variable of that type; false where no conversion exists.
     bool writeValue(const void* pValue, EFbxType pType);
     /// Stores the animated value in a variable of that type.
     void evaluate(void* pValue, EFbxType pType, const FbxTime& pTime);
@@ -247,7 +247,7 @@ public:
     /// The static value; T() when it cannot be converted.
     [[nodiscard]] T Get() const { return FbxProperty::Get<T>(); }
     operator T() const { return Get(); } ///< The static value.
-    /// Sets the static value; where it cannot be converted nothing happens.
+    /// Sets the static value; no effect where it cannot be converted.
     FbxPropertyT& Set(const T& pValue) {
         FbxProperty::Set(pValue);
         return *this;
@@ -260,7 +260,7 @@ public:
         return FbxProperty::EvaluateValue<T>(pTime, pForceEval);
     }
 
-    /// The untyped forms stay reachable: `light->LightType.Get<FbxEnum>()`.
+    /// Keeps the untyped forms visible: `light->LightType.Get<FbxEnum>()`.
     template <class Other>
     [[nodiscard]] Other Get() const {
         return FbxProperty::Get<Other>();

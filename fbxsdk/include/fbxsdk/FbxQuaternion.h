@@ -6,8 +6,8 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A rotation as four numbers: x, y, z of the axis by the sine of half the angle, w its cosine. Rotations have length
-/// 1, which is not enforced.
+/// A rotation as four numbers: x, y, z are the axis times the sine of half the angle, w its cosine. Rotations have
+/// length 1, which is not enforced.
 class FBXSDK_DLL FbxQuaternion : public FbxDouble4 {
 public:
     constexpr FbxQuaternion() : FbxDouble4(0.0, 0.0, 0.0, 1.0) {} ///< The identity (0, 0, 0, 1).
@@ -28,7 +28,7 @@ public:
     FbxQuaternion operator-() const { return {-mData[0], -mData[1], -mData[2], -mData[3]}; }
     FbxQuaternion operator+(const FbxQuaternion& pOther) const; ///< Component by component.
     FbxQuaternion operator-(const FbxQuaternion& pOther) const; ///< Component by component.
-    FbxQuaternion operator*(double pValue) const;               ///< All four times the number.
+    FbxQuaternion operator*(double pValue) const;               ///< All four multiplied by the number.
     FbxQuaternion operator/(double pValue) const;               ///< All four divided by it; by 0 infinite or NaN.
     /// The quaternion product: as a rotation, the right one first.
     FbxQuaternion operator*(const FbxQuaternion& pOther) const;
@@ -41,12 +41,12 @@ public:
 
     [[nodiscard]] double DotProduct(const FbxQuaternion& pOther) const; ///< The sum of the products of all four.
     [[nodiscard]] double Length() const;                                ///< Of all four; 1 for a rotation.
-    /// To length 1; a quaternion of length 0 becomes the identity.
+    /// Normalises to length 1; a quaternion of length 0 becomes the identity.
     void Normalize();
     void Conjugate(); ///< Negates x, y and z: the opposite rotation of a unit quaternion.
     /// The multiplicative inverse; of a quaternion of length 0 the identity.
     void Inverse();
-    /// From this rotation (weight 0) to the other one (weight 1) on the shorter way, at constant speed.
+    /// Interpolates from this rotation (weight 0) to the other one (weight 1) on the shorter arc, at constant speed.
     [[nodiscard]] FbxQuaternion Slerp(const FbxQuaternion& pOther, double pWeight) const;
 
     /// Sets the rotation from Euler XYZ angles in degrees; w of the argument is ignored.

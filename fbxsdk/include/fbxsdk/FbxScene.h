@@ -20,29 +20,29 @@ struct SceneData;
 }
 
 /// A node tree, settings, and every object that belongs to them. The objects are the scene's members, its sources in
-/// order of entry; they go with it.
+/// order of entry; they are destroyed with it.
 class FBXSDK_DLL FbxScene : public FbxDocument {
     FBXSDK_OBJECT_DECLARE(FbxScene, FbxDocument)
 
 public:
-    /// The node above all others; never null. There from the start: "RootNode", without attribute, at the identity. It
-    /// is not saved.
+    /// The ancestor of all other nodes; never null. Present from the start: "RootNode", without attribute, at the
+    /// identity. It is not saved.
     [[nodiscard]] FbxNode* GetRootNode() const;
 
-    [[nodiscard]] FbxGlobalSettings& GetGlobalSettings(); ///< Axes, unit, time mode; they live as long as the scene.
+    [[nodiscard]] FbxGlobalSettings& GetGlobalSettings(); ///< Axes, unit, time mode; valid as long as the scene.
     [[nodiscard]] const FbxGlobalSettings& GetGlobalSettings() const; ///< The same for a const scene.
-    /// Ambient light and fog; they live as long as the scene.
+    /// Ambient light and fog; valid as long as the scene.
     [[nodiscard]] FbxGlobalLightSettings& GlobalLightSettings();
     [[nodiscard]] FbxGlobalCameraSettings& GlobalCameraSettings(); ///< The default camera and the producer cameras.
-    [[nodiscard]] FbxGlobalTimeSettings& GlobalTimeSettings();     ///< The time mode as files before 7.x have it.
+    [[nodiscard]] FbxGlobalTimeSettings& GlobalTimeSettings();     ///< The time mode as files before 7.x hold it.
 
-    /// How many nodes are members: the root, everything below it, and nodes without a parent, as those of the producer
+    /// How many nodes are members: the root, its descendants, and unparented nodes, such as those of the producer
     /// cameras.
     [[nodiscard]] int GetNodeCount() const;
-    /// The node at that place in order of entry, the root first; null out of range.
+    /// The node at that index in order of entry, the root first; null out of range.
     [[nodiscard]] FbxNode* GetNode(int pIndex) const;
 
-    /// The stack that transforms and properties are evaluated with. Null means the scene's first one; a stack that is
+    /// The stack by which transforms and properties are evaluated. Null means the scene's first one; a stack that is
     /// not the scene's changes nothing. Its name becomes the document's ActiveAnimStackName.
     void SetCurrentAnimationStack(FbxAnimStack* pAnimStack);
     /// The stack that was set, else the scene's first, whatever ActiveAnimStackName says; null without any.

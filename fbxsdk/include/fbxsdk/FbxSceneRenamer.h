@@ -6,12 +6,12 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// How names are changed on export. The platform leaves them as they are, whatever is asked for.
+/// How names are changed on export. The platform leaves them unchanged in every mode.
 class FBXSDK_DLL FbxSceneRenamer {
 public:
-    /// From which program's rules to which; all of them rename nothing here.
+    /// From which program's rules to which; none of them renames anything here.
     enum ERenamingMode {
-        eNone,               ///< as they are
+        eNone,               ///< unchanged
         eMAYA_TO_FBX5,       ///< Maya to FBX 5
         eMAYA_TO_FBX_MB75,   ///< Maya to MotionBuilder 7.5
         eMAYA_TO_FBX_MB70,   ///< Maya to MotionBuilder 7.0

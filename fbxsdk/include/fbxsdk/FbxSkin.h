@@ -12,12 +12,12 @@ FBXSDK_NAMESPACE_BEGIN
 class FbxCluster;
 class FbxGeometry;
 
-/// Deformation by nodes that move. Clusters are the skin's source objects of that class, in order of connection.
+/// Deformation by moving nodes. Clusters are the skin's source objects of that class, in order of connection.
 class FBXSDK_DLL FbxSkin : public FbxDeformer {
     FBXSDK_OBJECT_DECLARE(FbxSkin, FbxDeformer)
 
 public:
-    /// How the clusters of a point are mixed.
+    /// How the clusters of a point are blended.
     enum EType {
         eRigid,          ///< each point follows one cluster; the default
         eLinear,         ///< by the sum of their matrices
@@ -27,30 +27,31 @@ public:
 
     [[nodiscard]] EDeformerType GetDeformerType() const override; ///< eSkin.
 
-    /// False for null and when the cluster is there already.
+    /// False for null and when the cluster is already part of it.
     bool AddCluster(FbxCluster* pCluster);
-    /// Returns the cluster, or null when it is none of the skin.
+    /// Returns the cluster, or null when it is not the skin's.
     FbxCluster* RemoveCluster(FbxCluster* pCluster);
     /// How many clusters there are.
     [[nodiscard]] int GetClusterCount() const { return static_cast<int>(mClusters.size()); }
-    /// The cluster at that place; null out of range.
+    /// The cluster at that index; null out of range.
     [[nodiscard]] FbxCluster* GetCluster(int pIndex);
     /// The same for a const skin.
     [[nodiscard]] const FbxCluster* GetCluster(int pIndex) const;
 
     /// The geometry that it deforms; null when there is none.
     [[nodiscard]] FbxGeometry* GetGeometry();
-    /// Makes it deform that geometry and no other; null takes it away. False when it cannot be connected.
+    /// Makes it deform that geometry and no other; null removes it from its geometry. False when it cannot be
+    /// connected.
     bool SetGeometry(FbxGeometry* pGeometry);
 
     void SetSkinningType(EType pType) { mSkinningType = pType; } ///< Any value is stored.
-    /// eRigid by default and for files that do not say.
+    /// eRigid by default and for files that do not state it.
     [[nodiscard]] EType GetSkinningType() const { return mSkinningType; }
     /// Percent, for applications; not checked.
     void SetDeformAccuracy(double pDeformAccuracy) { mDeformAccuracy = pDeformAccuracy; }
     [[nodiscard]] double GetDeformAccuracy() const { return mDeformAccuracy; } ///< 50 by default.
 
-    /// Of eBlend: how much of the dual quaternions a point takes, 0 for all linear; nothing is said of other points.
+    /// Of eBlend: the share of the dual quaternions at a point, 0 for all linear; other points are unaffected.
     void AddControlPointIndex(int pIndex, double pBlendWeight = 0);
     /// How many points have such a weight.
     [[nodiscard]] int GetControlPointIndicesCount() const { return mIndices.count(); }
@@ -61,7 +62,7 @@ public:
     [[nodiscard]] double* GetControlPointBlendWeights() const;
 
 protected:
-    /// Keeps the list of clusters in step with the connections.
+    /// Keeps the list of clusters consistent with the connections.
     FBXSDK_LOCAL void connectionChanged(FbxObject& pSource, FbxObject& pDestination, bool pConnected) override;
 
 private:

@@ -9,23 +9,23 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// An owned byte string; UTF-8 wherever it crosses the API. Lengths and indices count bytes, and letters are those of
-/// ASCII.
+/// An owned byte string; UTF-8 wherever it crosses the API. Lengths and indices count bytes; case conversions are those
+/// of ASCII.
 class FBXSDK_DLL FbxString {
 public:
     FbxString() = default;                                   ///< The empty string.
     FbxString(const char* pStr) : mText(pStr ? pStr : "") {} ///< Null gives the empty string.
     FbxString(const char* pStr, size_t pLength); ///< The first pLength bytes, less when the string ends before.
-    explicit FbxString(char pChar, size_t pRepeatCount = 1) : mText(pRepeatCount, pChar) {} ///< One byte over and over.
+    explicit FbxString(char pChar, size_t pRepeatCount = 1) : mText(pRepeatCount, pChar) {} ///< One byte repeated.
     explicit FbxString(int pValue);                                                         ///< In decimal form.
     explicit FbxString(float pValue);  ///< The shortest decimal form that reads back the same.
     explicit FbxString(double pValue); ///< The shortest decimal form that reads back the same.
 
     FbxString& operator=(const char* pStr); ///< Null gives the empty string; a part of this string may be given.
 
-    [[nodiscard]] size_t GetLen() const { return mText.size(); } ///< Bytes, without the ending zero.
+    [[nodiscard]] size_t GetLen() const { return mText.size(); } ///< Bytes, without the terminating zero.
     [[nodiscard]] bool IsEmpty() const { return mText.empty(); } ///< Whether there are no bytes.
-    void Clear() { mText.clear(); }                              ///< Back to the empty string.
+    void Clear() { mText.clear(); }                              ///< Resets to the empty string.
     /// Zero-terminated, never null; valid until the string changes.
     [[nodiscard]] char* Buffer() { return mText.data(); }
     [[nodiscard]] const char* Buffer() const { return mText.c_str(); } ///< The same for reading.
@@ -46,14 +46,14 @@ public:
 
     /// Index of the first occurrence at or after the start; -1 when there is none.
     [[nodiscard]] int Find(char pChar, size_t pStartPosition = 0) const;
-    /// The same for a string of bytes; case counts.
+    /// The same for a string of bytes; case matters.
     [[nodiscard]] int Find(const char* pStrSub, size_t pStartPosition = 0) const;
     /// Index of the last occurrence; -1 when there is none.
     [[nodiscard]] int ReverseFind(char pChar) const;
 
     [[nodiscard]] FbxString Left(size_t pCount) const; ///< The first bytes; all of them when there are fewer.
     [[nodiscard]] FbxString Mid(size_t pFirst) const;  ///< From that byte on; empty beyond the end.
-    /// So many bytes from that one on, fewer when the string ends before.
+    /// That many bytes from that one on, fewer when the string ends before.
     [[nodiscard]] FbxString Mid(size_t pFirst, size_t pCount) const;
     [[nodiscard]] FbxString Right(size_t pCount) const; ///< The last bytes; all of them when there are fewer.
     [[nodiscard]] FbxString Upper() const;              ///< ASCII letters only.
@@ -63,7 +63,7 @@ private:
     std::string mText;
 };
 
-/// Both strings in one; the operands stay.
+/// Both strings concatenated; the operands are unchanged.
 inline FbxString operator+(const FbxString& pLeft, const FbxString& pRight) { return FbxString(pLeft) += pRight; }
 /// The same; null counts as the empty string.
 inline FbxString operator+(const FbxString& pLeft, const char* pRight) { return FbxString(pLeft) += pRight; }

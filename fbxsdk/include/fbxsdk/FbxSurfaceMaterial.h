@@ -1,21 +1,21 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Materials: the plain one, and the two whose shading model is known.
+// Materials: the generic one, and the two with a known shading model.
 #pragma once
 
 #include <fbxsdk/FbxObject.h>
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// A material of any shading model. Nodes carry materials (FbxNode::AddMaterial); which polygon has which is said by
-/// layer elements.
+/// A material of any shading model. Nodes have materials (FbxNode::AddMaterial); layer elements assign them to
+/// polygons.
 class FBXSDK_DLL FbxSurfaceMaterial : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxSurfaceMaterial, FbxObject)
 
 public:
     FbxPropertyT<FbxString> ShadingModel; ///< "Unknown", "Lambert" or "Phong" by class; any text
-    FbxPropertyT<FbxBool> MultiLayer;     ///< whether layers of textures count; false
+    FbxPropertyT<FbxBool> MultiLayer;     ///< whether layers of textures are used; false
 };
 
 /// A matt material. Colours are 0 to 1, each with a factor of its own; textures are sources of the properties.
@@ -32,7 +32,7 @@ public:
     FbxPropertyT<FbxDouble3> NormalMap,               ///< for a texture of normals; (0, 0, 0)
         Bump;                                         ///< for a texture of heights; (0, 0, 0)
     FbxPropertyT<FbxDouble> BumpFactor;               ///< 1
-    FbxPropertyT<FbxDouble3> TransparentColor;        ///< what passes through; black, animatable
+    FbxPropertyT<FbxDouble3> TransparentColor;        ///< the transmitted colour; black, animatable
     FbxPropertyT<FbxDouble> TransparencyFactor;       ///< 0 opaque (the default) to 1, animatable
     FbxPropertyT<FbxDouble3> DisplacementColor;       ///< for a texture of displacements along the normal; black
     FbxPropertyT<FbxDouble> DisplacementFactor;       ///< 1
@@ -40,7 +40,7 @@ public:
     FbxPropertyT<FbxDouble> VectorDisplacementFactor; ///< 1
 };
 
-/// A shining material: a matt one with highlights and reflections.
+/// A shiny material: a matt one with highlights and reflections.
 class FBXSDK_DLL FbxSurfacePhong : public FbxSurfaceLambert {
     FBXSDK_OBJECT_DECLARE(FbxSurfacePhong, FbxSurfaceLambert)
 

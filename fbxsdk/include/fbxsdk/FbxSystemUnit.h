@@ -12,7 +12,7 @@ class FbxScene;
 /// A unit of length: how many centimetres one unit is; and the conversion of scenes between units.
 class FBXSDK_DLL FbxSystemUnit {
 public:
-    /// What a conversion reaches beside the nodes' transforms.
+    /// What a conversion applies to besides the nodes' transforms.
     struct ConversionOptions {
         bool mConvertRrsNodes = true;               ///< nodes that do not inherit their parent's scale
         bool mConvertLimits = true;                 ///< limits of translation and scaling
@@ -23,24 +23,24 @@ public:
     };
 
     constexpr FbxSystemUnit() = default; ///< centimetres
-    /// So many centimetres, greater than zero. The multiplier is kept and enters no conversion.
+    /// That many centimetres, greater than zero. The multiplier is stored and has no part in conversions.
     constexpr FbxSystemUnit(double pScaleFactor, double pMultiplier = 1.0)
         : mScaleFactor(pScaleFactor), mMultiplier(pMultiplier) {}
 
     /// Scales the nodes below the root, their curves included, so that every global matrix is the old one in the new
     /// unit. Mesh points stay. The scene's global settings state this unit afterwards; a scene that has it already, and
-    /// null, are left alone.
+    /// null, are left unchanged.
     void ConvertScene(FbxScene* pScene, const ConversionOptions& pOptions = DefaultConversionOptions) const;
-    /// The same for the children of that node in place of the root's.
+    /// The same for the children of that node instead of the root's.
     void ConvertScene(FbxScene* pScene, FbxNode* pFbxRoot,
                       const ConversionOptions& pOptions = DefaultConversionOptions) const;
-    /// Scales the children of the node alone: cameras, bind matrices and global settings stay.
+    /// Scales the children of the node only: cameras, bind matrices and global settings stay.
     void ConvertChildren(FbxNode* pRoot, const FbxSystemUnit& pSrcUnit,
                          const ConversionOptions& pOptions = DefaultConversionOptions) const;
 
     /// Centimetres per unit.
     [[nodiscard]] double GetScaleFactor() const { return mScaleFactor; }
-    [[nodiscard]] double GetMultiplier() const { return mMultiplier; } ///< As given; enters no conversion.
+    [[nodiscard]] double GetMultiplier() const { return mMultiplier; } ///< As given; has no part in conversions.
     /// How many of the other unit one of this is.
     [[nodiscard]] double GetConversionFactorTo(const FbxSystemUnit& pTarget) const;
     /// How many of this unit one of the other is.

@@ -7,10 +7,11 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// What a file says of one of its animation stacks, before anything is imported. Changing it has no effect on Import.
+/// What a file states about one of its animation stacks, before anything is imported. Changing it has no effect on
+/// Import.
 class FBXSDK_DLL FbxTakeInfo {
 public:
-    /// How mImportOffset is meant; of no effect here.
+    /// The meaning of mImportOffset; of no effect here.
     enum EImportOffsetType {
         eAbsolute, ///< the stack begins there
         eRelative  ///< the stack is moved by it
@@ -18,7 +19,7 @@ public:
 
     FbxString mName,                                 ///< of the stack, UTF-8
         mImportName,                                 ///< the same name
-        mDescription;                                ///< of files from 7.0 on; mostly empty
+        mDescription;                                ///< of files from 7.0 on; usually empty
     bool mSelect = true;                             ///< true for every stack: all are imported
     FbxTimeSpan mLocalTimeSpan,                      ///< as the file states it; from zero to zero when it does not
         mReferenceTimeSpan;                          ///< as the file states it; from zero to zero when it does not

@@ -10,7 +10,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// What all textures share: use, mapping and placement. A texture is a source of the property that it colours.
+/// The common part of all textures: use, mapping and placement. A texture is a source of the property that it colours.
 class FBXSDK_DLL FbxTexture : public FbxObject {
     FBXSDK_ABSTRACT_DECLARE(FbxTexture, FbxObject)
 
@@ -26,25 +26,25 @@ public:
     };
     /// How a surface gets its coordinates.
     enum EMappingType {
-        eNull,        ///< not said
+        eNull,        ///< not set
         ePlanar,      ///< planar projection
         eSpherical,   ///< spherical projection
         eCylindrical, ///< cylindrical projection
         eBox,         ///< projection from six planes
-        eFace,        ///< each face by itself
+        eFace,        ///< each face separately
         eUV,          ///< by the geometry's texture coordinates; the default
         eEnvironment  ///< by reflection
     };
-    /// What lies beyond the coordinates 0 and 1.
+    /// The content beyond the coordinates 0 and 1.
     enum EWrapMode : int {
-        eRepeat, ///< the image over again; the default
-        eClamp   ///< the colour of its edge
+        eRepeat, ///< the image repeated; the default
+        eClamp   ///< the colour of its border
     };
 
     FbxPropertyT<FbxDouble> Alpha;          ///< in files "Texture alpha"; 0 to 1; 1, animatable
     FbxPropertyT<EWrapMode> WrapModeU,      ///< along u; eRepeat
         WrapModeV;                          ///< along v; eRepeat
-    FbxPropertyT<FbxBool> UVSwap;           ///< whether u and v change places; false
+    FbxPropertyT<FbxBool> UVSwap;           ///< whether u and v are swapped; false
     FbxPropertyT<FbxBool> PremultiplyAlpha; ///< whether colours are multiplied by alpha; true
     FbxPropertyT<FbxDouble3> Translation,   ///< (u, v, w); (0, 0, 0), animatable
         Rotation,                           ///< about (u, v, w), degrees; (0, 0, 0), animatable
@@ -55,7 +55,7 @@ public:
 
     void SetTextureUse(ETextureUse pTextureUse);     ///< In files TextureTypeUse.
     [[nodiscard]] ETextureUse GetTextureUse() const; ///< eStandard by default and for a number that is no use.
-    /// In files CurrentMappingType, where the numbers of eNull and eUV have changed places.
+    /// In files CurrentMappingType, where the numbers of eNull and eUV are swapped.
     void SetMappingType(EMappingType pMappingType);
     [[nodiscard]] EMappingType GetMappingType() const;       ///< eUV by default, eNull for a number that is no mapping.
     void SetSwapUV(bool pSwapUV);                            ///< The property UVSwap.
@@ -63,24 +63,24 @@ public:
     void SetTranslation(double pU, double pV);               ///< Sets u and v of the property Translation; w stays.
     [[nodiscard]] double GetTranslationU() const;            ///< 0 by default.
     [[nodiscard]] double GetTranslationV() const;            ///< 0 by default.
-    void SetScale(double pU, double pV);                     ///< Sets u and v of the property Scaling; w stays.
+    void SetScale(double pU, double pV);                     ///< Sets u and v of the property Scaling; w is unchanged.
     [[nodiscard]] double GetScaleU() const;                  ///< 1 by default.
     [[nodiscard]] double GetScaleV() const;                  ///< 1 by default.
     void SetRotation(double pU, double pV, double pW = 0.0); ///< Sets the property Rotation, degrees.
     [[nodiscard]] double GetRotationU() const;               ///< Degrees.
     [[nodiscard]] double GetRotationV() const;               ///< Degrees.
-    [[nodiscard]] double GetRotationW() const;               ///< Degrees; the turn within the plane of u and v.
+    [[nodiscard]] double GetRotationW() const;               ///< Degrees; the rotation within the plane of u and v.
 
 private:
     FbxPropertyT<FbxEnum> mTextureUse, mMapping;
 };
 
-/// A texture whose image is a file. Names are stored as given, UTF-8; no file is touched.
+/// A texture whose image is a file. Names are stored as given, UTF-8; no file is accessed.
 class FBXSDK_DLL FbxFileTexture : public FbxTexture {
     FBXSDK_OBJECT_DECLARE(FbxFileTexture, FbxTexture)
 
 public:
-    /// Whether the material's own colour counts beside the texture; kept in memory, not in files.
+    /// Whether the material's own colour is used besides the texture; kept in memory, not in files.
     enum EMaterialUse {
         eModelMaterial,  ///< the model's material; the default
         eDefaultMaterial ///< a default material
@@ -102,7 +102,7 @@ private:
     EMaterialUse mMaterialUse = eModelMaterial;
 };
 
-/// Several textures over one another: its sources, the lowest first.
+/// Several textures stacked: its sources, the lowest first.
 class FBXSDK_DLL FbxLayeredTexture : public FbxTexture {
     FBXSDK_OBJECT_DECLARE(FbxLayeredTexture, FbxTexture)
 };

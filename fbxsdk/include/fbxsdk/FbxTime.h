@@ -16,14 +16,14 @@ inline constexpr FbxLongLong FBXSDK_TC_MINUTE = FBXSDK_TC_SECOND * 60;        //
 inline constexpr FbxLongLong FBXSDK_TC_HOUR = FBXSDK_TC_MINUTE * 60;          ///< Ticks per hour.
 inline constexpr FbxLongLong FBXSDK_TC_DAY = FBXSDK_TC_HOUR * 24;             ///< Ticks per day.
 inline constexpr FbxLongLong FBXSDK_TC_INFINITY = INT64_MAX;                  ///< No end; the largest number of ticks.
-inline constexpr FbxLongLong FBXSDK_TC_MINFINITY = -INT64_MAX;                ///< No beginning; its negative.
+inline constexpr FbxLongLong FBXSDK_TC_MINFINITY = -INT64_MAX;                ///< Negative infinity; its negative.
 
-/// A time as a whole number of ticks, 46186158000 to the second.
+/// A time as a whole number of ticks, 46186158000 per second.
 ///
-/// Arithmetic never overflows: what is too far becomes FBXSDK_TC_INFINITY or FBXSDK_TC_MINFINITY.
+/// Arithmetic never overflows: results out of range become FBXSDK_TC_INFINITY or FBXSDK_TC_MINFINITY.
 class FBXSDK_DLL FbxTime {
 public:
-    /// How frames count. Files may hold any number; one that is no mode counts as eDefaultMode.
+    /// Frame rates. Files may hold any number; one that is no mode counts as eDefaultMode.
     enum EMode : int {
         eDefaultMode = 0, ///< the global time mode of the calling thread
         eFrames120,       ///< 120 frames per second
@@ -50,20 +50,20 @@ public:
     enum EProtocol {
         eSMPTE,          ///< hours, minutes, seconds, frames
         eFrameCount,     ///< the number of the frame
-        eDefaultProtocol ///< as the application does otherwise
+        eDefaultProtocol ///< the application's default
     };
 
-    /// That many ticks; not explicit, so that ticks pass for times.
+    /// That many ticks; not explicit, so that ticks convert to times.
     constexpr FbxTime(const FbxLongLong pTime = 0) : mTime(pTime) {}
 
     void Set(FbxLongLong pTime) { mTime = pTime; }                    ///< Sets the number of ticks.
     [[nodiscard]] constexpr FbxLongLong Get() const { return mTime; } ///< The number of ticks.
 
-    void SetMilliSeconds(FbxLongLong pMilliSeconds);   ///< Infinite when there are too many.
+    void SetMilliSeconds(FbxLongLong pMilliSeconds);   ///< Infinite when out of range.
     [[nodiscard]] FbxLongLong GetMilliSeconds() const; ///< Whole milliseconds, truncated toward zero.
 
-    /// Rounds to the nearest tick, so that frame ÷ rate lands exactly on the frame. NaN gives zero; what is too far
-    /// becomes infinite.
+    /// Rounds to the nearest tick, so that frame ÷ rate lands exactly on the frame. NaN gives zero; a value out of
+    /// range becomes infinite.
     void SetSecondDouble(double pTime);
     [[nodiscard]] double GetSecondDouble() const; ///< The nearest double to ticks ÷ 46186158000.
 
@@ -85,10 +85,10 @@ public:
     /// The first mode whose rate is no further than the precision away; eDefaultMode when there is none.
     [[nodiscard]] static EMode ConvertFrameRateToTimeMode(double pFrameRate, double pPrecision = 0.00000001);
 
-    /// What eDefaultMode and eCustom mean on the calling thread; other threads keep theirs. The rate is used with
+    /// The meaning of eDefaultMode and eCustom on the calling thread; other threads keep theirs. The rate is used with
     /// eCustom only; one that is not greater than zero counts as 30.
     static void SetGlobalTimeMode(EMode pTimeMode, double pFrameRate = 0.0);
-    [[nodiscard]] static EMode GetGlobalTimeMode(); ///< Of the calling thread; eFrames30 at first.
+    [[nodiscard]] static EMode GetGlobalTimeMode(); ///< Of the calling thread; initially eFrames30.
 
     /// Exact, in ticks, as all comparisons are.
     constexpr bool operator==(const FbxTime& pTime) const { return mTime == pTime.mTime; }
@@ -98,37 +98,37 @@ public:
     constexpr bool operator>(const FbxTime& pTime) const { return mTime > pTime.mTime; }   ///< Later.
     constexpr bool operator>=(const FbxTime& pTime) const { return mTime >= pTime.mTime; } ///< Not earlier.
 
-    FbxTime& operator+=(const FbxTime& pTime);     ///< Infinite when the sum is too far.
-    FbxTime& operator-=(const FbxTime& pTime);     ///< Infinite when the difference is too far.
-    FbxTime operator+(const FbxTime& pTime) const; ///< Infinite when the sum is too far.
-    FbxTime operator-(const FbxTime& pTime) const; ///< Infinite when the difference is too far.
+    FbxTime& operator+=(const FbxTime& pTime);     ///< Infinite when the sum is out of range.
+    FbxTime& operator-=(const FbxTime& pTime);     ///< Infinite when the difference is out of range.
+    FbxTime operator+(const FbxTime& pTime) const; ///< Infinite when the sum is out of range.
+    FbxTime operator-(const FbxTime& pTime) const; ///< Infinite when the difference is out of range.
     FbxTime operator*(const FbxTime& pTime) const; ///< The product of the tick counts.
     FbxTime operator/(const FbxTime& pTime) const; ///< The quotient of the tick counts; division by zero saturates.
-    FbxTime operator*(int pFactor) const;          ///< That many times as long.
+    FbxTime operator*(int pFactor) const;          ///< Multiplied by the number.
     FbxTime operator/(int pDivisor) const; ///< That part of it, truncated toward zero; division by zero saturates.
 
-    FbxTime& operator++();   ///< One tick on.
-    FbxTime operator++(int); ///< One tick on; the result is the time before.
-    FbxTime& operator--();   ///< One tick back.
-    FbxTime operator--(int); ///< One tick back; the result is the time before.
+    FbxTime& operator++();   ///< Adds one tick.
+    FbxTime operator++(int); ///< Adds one tick; returns the time before.
+    FbxTime& operator--();   ///< Subtracts one tick.
+    FbxTime operator--(int); ///< Subtracts one tick; returns the time before.
 
 private:
     FbxLongLong mTime;
 };
 
-inline constexpr FbxTime FBXSDK_TIME_ZERO{FBXSDK_TC_ZERO};         ///< No time at all.
+inline constexpr FbxTime FBXSDK_TIME_ZERO{FBXSDK_TC_ZERO};         ///< Zero.
 inline constexpr FbxTime FBXSDK_TIME_EPSILON{FBXSDK_TC_EPSILON};   ///< One tick.
 inline constexpr FbxTime FBXSDK_TIME_ONE_SECOND{FBXSDK_TC_SECOND}; ///< 46186158000 ticks.
 inline constexpr FbxTime FBXSDK_TIME_ONE_MINUTE{FBXSDK_TC_MINUTE}; ///< 60 seconds.
 inline constexpr FbxTime FBXSDK_TIME_ONE_HOUR{FBXSDK_TC_HOUR};     ///< 60 minutes.
-/// No end; as a time of evaluation: the static value.
+/// Positive infinity; as a time of evaluation: the static value.
 inline constexpr FbxTime FBXSDK_TIME_INFINITE{FBXSDK_TC_INFINITY};
-inline constexpr FbxTime FBXSDK_TIME_MINUS_INFINITE{FBXSDK_TC_MINFINITY}; ///< No beginning.
+inline constexpr FbxTime FBXSDK_TIME_MINUS_INFINITE{FBXSDK_TC_MINFINITY}; ///< Negative infinity.
 
 inline constexpr int FBXSDK_TIME_FORWARD = 1;  ///< A span whose stop is not before its start.
 inline constexpr int FBXSDK_TIME_BACKWARD = 0; ///< A span whose stop is before its start.
 
-/// A pair of times; the start may lie behind the stop.
+/// A pair of times; the start may be after the stop.
 class FBXSDK_DLL FbxTimeSpan {
 public:
     constexpr FbxTimeSpan() = default;                                                     ///< From zero to zero.
@@ -137,7 +137,7 @@ public:
     void Set(FbxTime pStart, FbxTime pStop) { *this = FbxTimeSpan(pStart, pStop); } ///< As given, in any order.
     void SetStart(FbxTime pStart) { mStart = pStart; }                              ///< The stop stays.
     void SetStop(FbxTime pStop) { mStop = pStop; }                                  ///< The start stays.
-    /// The first of the pair, not always the earlier.
+    /// The first of the pair, not necessarily the earlier.
     [[nodiscard]] constexpr FbxTime GetStart() const { return mStart; }
     [[nodiscard]] constexpr FbxTime GetStop() const { return mStop; } ///< The second of the pair.
 
@@ -149,7 +149,7 @@ public:
     [[nodiscard]] int GetDirection() const;
     /// Whether the time lies between start and stop, both included.
     [[nodiscard]] bool IsInside(FbxTime pTime) const;
-    /// The common part in this span's direction; an empty span at zero when there is none.
+    /// The intersection in this span's direction; an empty span at zero when there is none.
     [[nodiscard]] FbxTimeSpan Intersect(const FbxTimeSpan& pOther) const;
     /// Widens this span so that it covers the other one, in the given direction.
     void UnionAssignment(const FbxTimeSpan& pOther, int pDirection = FBXSDK_TIME_FORWARD);

@@ -6,14 +6,14 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// How a node's transform takes over its parent's.
+/// How a node's transform inherits its parent's.
 class FBXSDK_DLL FbxTransform {
 public:
-    /// Where the parent's scaling (S) enters among the child's rotation (r) and scaling (s).
+    /// Where the parent's scaling (S) is applied relative to the child's rotation (r) and scaling (s).
     enum EInheritType {
         eInheritRrSs = 0, ///< after the child's rotation, along the child's axes
         eInheritRSrs = 1, ///< before it: the plain product of the matrices
-        eInheritRrs = 2   ///< the parent's own scaling is left out
+        eInheritRrs = 2   ///< the parent's own scaling is excluded
     };
 };
 

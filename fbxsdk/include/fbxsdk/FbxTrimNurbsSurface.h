@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A NURBS surface with parts cut away, and the outlines of the cuts.
+// A NURBS surface with parts cut out, and the outlines of the cuts.
 #pragma once
 
 #include <fbxsdk/FbxNurbsCurve.h>
@@ -14,18 +14,18 @@ class FBXSDK_DLL FbxBoundary : public FbxGeometry {
     FBXSDK_OBJECT_DECLARE(FbxBoundary, FbxGeometry)
 
 public:
-    /// "OuterBoundary": the name of the property that marks the outline of the surface, as against holes.
+    /// "OuterBoundary": the name of the property that marks the outline of the surface, as opposed to holes.
     static const char* const sOuterFlag;
 
     [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eBoundary.
 
-    void AddCurve(FbxNurbsCurve* pCurve);    ///< Null and a curve that is there already change nothing.
+    void AddCurve(FbxNurbsCurve* pCurve);    ///< Null and a curve that is already part of it change nothing.
     [[nodiscard]] int GetCurveCount() const; ///< How many curves the outline consists of.
-    /// The curve at that place; null out of range.
+    /// The curve at that index; null out of range.
     [[nodiscard]] FbxNurbsCurve* GetCurve(int pIndex) const;
 
 protected:
-    /// A boundary has nothing in the file beyond its curves.
+    /// A boundary has no data in the file beyond its curves.
     FBXSDK_LOCAL bool readSource(const detail::GeometrySource& pSource) override;
 };
 
@@ -36,14 +36,14 @@ class FBXSDK_DLL FbxTrimNurbsSurface : public FbxGeometry {
 public:
     [[nodiscard]] FbxNodeAttribute::EType GetAttributeType() const override; ///< eTrimNurbsSurface.
 
-    /// Replaces the surface that is cut; null removes it. The surface stays its manager's.
+    /// Replaces the surface that is cut; null removes it. Its manager still owns the surface.
     void SetNurbsSurface(const FbxNurbsSurface* pNurbs);
     [[nodiscard]] FbxNurbsSurface* GetNurbsSurface() const; ///< Null when there is none.
-    bool AddBoundary(FbxBoundary* pBoundary);               ///< False for null and when it is there already.
+    bool AddBoundary(FbxBoundary* pBoundary);               ///< False for null and when it is already part of it.
     [[nodiscard]] int GetBoundaryCount() const;             ///< How many boundaries there are.
-    /// The boundary at that place; null out of range.
+    /// The boundary at that index; null out of range.
     [[nodiscard]] FbxBoundary* GetBoundary(int pIndex) const;
-    void SetFlipNormals(bool pFlip);           ///< Whether the normals point against those of the surface.
+    void SetFlipNormals(bool pFlip);           ///< Whether the normals are opposite to those of the surface.
     [[nodiscard]] bool GetFlipNormals() const; ///< False by default.
 
     /// The points are those of the surface; 0 without one.
@@ -55,7 +55,7 @@ public:
     /// Of the surface; (0, 0, 0, 1) without one and out of range.
     [[nodiscard]] FbxVector4 GetControlPointAt(int pIndex) const override;
 
-    /// The platform's own view: as it is, without asking the file.
+    /// The platform's own view: the data in memory, without reading the file.
     [[nodiscard]] bool& flipNormals() { return mFlipNormals; }
 
 protected:

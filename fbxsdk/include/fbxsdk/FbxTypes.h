@@ -28,22 +28,22 @@ enum EFbxType : int {
     eFbxDouble4 = 15,   ///< FbxDouble4, also colours with alpha and quaternions
     eFbxDouble4x4 = 16, ///< FbxDouble4x4; no property here holds one
     eFbxEnum = 17,      ///< FbxEnum
-    eFbxEnumM = -17,    ///< an enumeration of which values can be used up; the same as eFbxEnum here
+    eFbxEnumM = -17,    ///< an enumeration of single-use values; the same as eFbxEnum here
     eFbxString = 18,    ///< FbxString
     eFbxTime = 19,      ///< FbxTime
     eFbxReference = 20, ///< an object, held by a connection
-    eFbxBlob = 21,      ///< bytes that mean nothing to the platform
+    eFbxBlob = 21,      ///< bytes without a meaning to the platform
     eFbxDistance = 22,  ///< a length with a unit of its own
     eFbxDateTime = 23,  ///< a date, as text
     eFbxTypeCount = 24  ///< how many types there are; none itself
 };
 
-inline constexpr double FBXSDK_TOLERANCE = 1.0e-6;             ///< What matrices may differ by and still be equal.
+inline constexpr double FBXSDK_TOLERANCE = 1.0e-6;             ///< The tolerance within which matrices are equal.
 inline constexpr double FBXSDK_PI = 3.14159265358979323846;    ///< π.
 inline constexpr double FBXSDK_PI_DIV_180 = FBXSDK_PI / 180.0; ///< Radians per degree.
 inline constexpr double FBXSDK_180_DIV_PI = 180.0 / FBXSDK_PI; ///< Degrees per radian.
 
-/// Two numbers in a row. Zero when made without values; compared exactly.
+/// Two consecutive numbers. Zero by default; compared exactly.
 template <typename T>
 class FbxVectorTemplate2 {
 public:
@@ -65,7 +65,7 @@ public:
     T mData[2] = {}; ///< the numbers
 };
 
-/// Three numbers in a row. Zero when made without values; compared exactly.
+/// Three consecutive numbers. Zero by default; compared exactly.
 template <typename T>
 class FbxVectorTemplate3 {
 public:
@@ -88,7 +88,7 @@ public:
     T mData[3] = {}; ///< the numbers
 };
 
-/// Four numbers (or rows of numbers) in a row. Zero when made without values; compared exactly.
+/// Four consecutive numbers (or rows of numbers). Zero by default; compared exactly.
 template <typename T>
 class FbxVectorTemplate4 {
 public:

@@ -24,23 +24,23 @@ public:
     FbxVector2 operator-(const FbxVector2& pVector) const {
         return {mData[0] - pVector.mData[0], mData[1] - pVector.mData[1]};
     }
-    /// That many times as long.
+    /// Multiplied by the number.
     FbxVector2 operator*(double pValue) const { return {mData[0] * pValue, mData[1] * pValue}; }
-    /// That part of it; by 0 infinite or NaN.
+    /// Divided by the number; by 0 infinite or NaN.
     FbxVector2 operator/(double pValue) const { return {mData[0] / pValue, mData[1] / pValue}; }
     FbxVector2& operator+=(const FbxVector2& pVector) { return *this = *this + pVector; } ///< Component by component.
     FbxVector2& operator-=(const FbxVector2& pVector) { return *this = *this - pVector; } ///< Component by component.
-    FbxVector2& operator*=(double pValue) { return *this = *this * pValue; }              ///< That many times as long.
-    FbxVector2& operator/=(double pValue) { return *this = *this / pValue; }              ///< That part of it.
+    FbxVector2& operator*=(double pValue) { return *this = *this * pValue; }              ///< Multiplied by the number.
+    FbxVector2& operator/=(double pValue) { return *this = *this / pValue; }              ///< Divided by the number.
 
     /// The sum of the products of the components.
     [[nodiscard]] double DotProduct(const FbxVector2& pVector) const {
         return mData[0] * pVector.mData[0] + mData[1] * pVector.mData[1];
     }
-    /// The square of the length, which needs no root.
+    /// The square of the length, which needs no square root.
     [[nodiscard]] double SquareLength() const { return DotProduct(*this); }
     [[nodiscard]] double Length() const; ///< Never negative.
-    /// To length 1; a vector of length 0 stays as it is.
+    /// Normalises to length 1; a vector of length 0 is unchanged.
     void Normalize();
 };
 

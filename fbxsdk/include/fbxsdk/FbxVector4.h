@@ -37,9 +37,9 @@ public:
     FbxVector4 operator-() const { return {-mData[0], -mData[1], -mData[2], -mData[3]}; } ///< All four negated.
     /// Added to all four.
     FbxVector4 operator+(double pValue) const { return *this + FbxVector4(pValue, pValue, pValue, pValue); }
-    /// Taken from all four.
+    /// Subtracted from all four.
     FbxVector4 operator-(double pValue) const { return *this - FbxVector4(pValue, pValue, pValue, pValue); }
-    /// All four times the number.
+    /// All four multiplied by the number.
     FbxVector4 operator*(double pValue) const { return *this * FbxVector4(pValue, pValue, pValue, pValue); }
     /// All four divided by it; by 0 infinite or NaN.
     FbxVector4 operator/(double pValue) const { return *this / FbxVector4(pValue, pValue, pValue, pValue); }
@@ -64,8 +64,8 @@ public:
                 mData[3] / pVector.mData[3]};
     }
     FbxVector4& operator+=(double pValue) { return *this = *this + pValue; } ///< Added to all four.
-    FbxVector4& operator-=(double pValue) { return *this = *this - pValue; } ///< Taken from all four.
-    FbxVector4& operator*=(double pValue) { return *this = *this * pValue; } ///< All four times the number.
+    FbxVector4& operator-=(double pValue) { return *this = *this - pValue; } ///< Subtracted from all four.
+    FbxVector4& operator*=(double pValue) { return *this = *this * pValue; } ///< All four multiplied by the number.
     FbxVector4& operator/=(double pValue) { return *this = *this / pValue; } ///< All four divided by it.
     /// Component by component, all four.
     FbxVector4& operator+=(const FbxVector4& pVector) { return *this = *this + pVector; }
@@ -85,11 +85,11 @@ public:
     [[nodiscard]] double SquareLength() const { return DotProduct(*this); } ///< The square of the length of x, y, z.
     [[nodiscard]] double Length() const;                                    ///< Of x, y, z; never negative.
     [[nodiscard]] double Distance(const FbxVector4& pVector) const;         ///< Between both as points x, y, z.
-    /// x, y, z to length 1, w untouched; a vector of length 0 stays as it is.
+    /// Normalises x, y, z to length 1, w untouched; a vector of length 0 is unchanged.
     void Normalize();
 };
 
-/// All four times the number.
+/// All four multiplied by the number.
 inline FbxVector4 operator*(double pValue, const FbxVector4& pVector) { return pVector * pValue; }
 
 FBXSDK_NAMESPACE_END

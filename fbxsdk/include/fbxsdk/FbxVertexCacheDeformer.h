@@ -13,7 +13,7 @@ class FBXSDK_DLL FbxVertexCacheDeformer : public FbxDeformer {
     FBXSDK_OBJECT_DECLARE(FbxVertexCacheDeformer, FbxDeformer)
 
 public:
-    /// What the cache's numbers are of the geometry.
+    /// Which part of the geometry the cache holds.
     enum ECacheChannelType {
         ePositions,  ///< control points
         eNormals,    ///< normals
@@ -30,7 +30,7 @@ public:
 
     [[nodiscard]] EDeformerType GetDeformerType() const override; ///< eVertexCache.
 
-    /// The deformer's source cache; setting one replaces it, null removes it. The cache stays its manager's.
+    /// The deformer's source cache; setting one replaces it, null removes it. Its manager still owns the cache.
     void SetCache(FbxCache* pCache);
     [[nodiscard]] FbxCache* GetCache() const; ///< Null when there is none.
 };

@@ -6,7 +6,7 @@
 
 FBXSDK_NAMESPACE_BEGIN
 
-/// An image or clip that textures show: a source of theirs. Names are stored as given, UTF-8; no file is touched.
+/// An image or clip of textures: a source of theirs. Names are stored as given, UTF-8; no file is accessed.
 class FBXSDK_DLL FbxVideo : public FbxObject {
     FBXSDK_OBJECT_DECLARE(FbxVideo, FbxObject)
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The same as <fbxsdk.h>, for code that has a header of nearly that name itself.
+// The same as <fbxsdk.h>, for code with a header of a similar name of its own.
 #pragma once
 
 #include "../fbxsdk.h"

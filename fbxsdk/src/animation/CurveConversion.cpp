@@ -19,7 +19,7 @@ bool hasLegacyForm(const KeyAttributes& attributes) {
     return plain && attributes.data[KeyData::rightSlope] == 0.0F && attributes.data[KeyData::nextLeftSlope] == 0.0F;
 }
 
-/// Whether the tangents of a cubic key are found from its neighbours and nothing else.
+/// Whether the tangents of a cubic key depend only on the adjacent keys.
 bool isAutomatic(std::uint32_t flags) {
     return (flags & KeyFlag::cubic) != 0 && (flags & KeyFlag::tangentAuto) != 0 &&
            (flags & (KeyFlag::tangentUser | KeyFlag::tangentTcb)) == 0;
@@ -32,13 +32,13 @@ bool isBentEnd(const CurveKeys& keys, std::size_t key) {
            ((isFirst && rightSlope(keys, key) != 0.0) || (isLast && leftSlope(keys, key) != 0.0));
 }
 
-/// Which keys an old file can hold as they are. It has the slope at which a cubic key comes to the next one only where
-/// that is worked out anew from the next key, or said by the user.
+/// Which keys an old file can hold unchanged. It has the slope at which a cubic key reaches the next one only where
+/// that is computed from the next key, or set by the user.
 std::vector<bool> keptKeys(const CurveKeys& keys) {
     constexpr std::uint32_t kStored = KeyFlag::tangentUser | KeyFlag::constant;
     constexpr std::uint32_t kWorkedOut = KeyFlag::tangentAuto | KeyFlag::tangentTcb;
     std::vector<bool> legacy(keys.keyCount());
-    bool losesLeftSlope = false; // the key that comes next
+    bool losesLeftSlope = false; // the following key
     for (std::size_t key = keys.keyCount(); key-- > 0;) {
         const KeyAttributes& attributes = keys.attributesOf(key);
         const bool cubic = (attributes.flags & KeyFlag::cubic) != 0;
@@ -49,7 +49,7 @@ std::vector<bool> keptKeys(const CurveKeys& keys) {
     return legacy;
 }
 
-/// The key as a user would have to set it for the curve to be the same.
+/// The key with user tangents that give the same curve.
 KeyAttributes userAttributes(const CurveKeys& keys, std::size_t key, bool nextStaysAuto) {
     constexpr std::uint32_t kWorkedOut = KeyFlag::tangentAuto | KeyFlag::tangentTcb | KeyFlag::genericClamp |
                                          KeyFlag::genericClampProgressive | KeyFlag::genericTimeIndependent;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The value of a keyed curve at any time: find the segment, interpolate it as its left key says; outside the keys map
+// The value of a keyed curve at any time: find the segment, interpolate it by its left key; outside the keys map
 // the time back into them. Arithmetic is in double from whole ticks, results are single precision.
 #include "animation/CurveEvaluation.h"
 
@@ -18,7 +18,7 @@ namespace {
 
 double valueOf(const CurveKeys& keys, std::size_t key) { return static_cast<double>(keys.values[key]); }
 
-/// Rounds to single precision; what is too far becomes the largest float.
+/// Rounds to single precision; a value out of range becomes the largest float.
 float toFloat(double value) {
     constexpr double kLargest = static_cast<double>(std::numeric_limits<float>::max());
     return static_cast<float>(std::isfinite(value) ? std::clamp(value, -kLargest, kLargest) : value);
@@ -34,7 +34,7 @@ double bezier(double p0, double p1, double p2, double p3, double u) {
 /// With weights of 0 to 1 the cubic rises throughout, so there is one; Newton's steps are taken while they stay inside
 /// the interval known to hold it, and halved intervals otherwise.
 double parameterAt(double part, double right, double left) {
-    constexpr int kSteps = 64; // enough to halve the interval down to nothing
+    constexpr int kSteps = 64; // enough to halve the interval until it is empty
     constexpr double kPrecision = 1.0e-15;
     double low = 0.0;
     double high = 1.0;
@@ -96,13 +96,13 @@ double segmentValue(const CurveKeys& keys, std::size_t key, std::int64_t ticks, 
     return cubicValue(cursor.cubic, passed);
 }
 
-/// Whether the time lies at or behind the key and before the next one.
+/// Whether the time is at or after the key and before the next one.
 bool isInSegment(const CurveKeys& keys, std::size_t key, std::int64_t ticks) {
     const std::size_t last = keys.keyCount() - 1;
     return key <= last && keys.times[key] <= ticks && (key == last || ticks < keys.times[key + 1]);
 }
 
-/// The last key at or before a time that lies within the keys. Samples mostly come in order: the segment of the last
+/// The last key at or before a time that lies within the keys. Samples usually come in order: the segment of the last
 /// one and the segment after it are tried first.
 std::size_t segmentAt(const CurveKeys& keys, std::int64_t ticks, CurveCursor& cursor) {
     const std::size_t guess = cursor.segment;
@@ -120,7 +120,7 @@ std::size_t segmentAt(const CurveKeys& keys, std::int64_t ticks, CurveCursor& cu
     return segment;
 }
 
-/// Whether the time lies in the cubic segment of the last one, where most do.
+/// Whether the time is in the cubic segment of the last one, the most frequent case.
 bool isWithinCubic(const CurveKeys& keys, std::int64_t ticks, const CurveCursor& cursor) {
     const std::size_t key = cursor.segment;
     return key == cursor.cubic.key && key + 1 < keys.keyCount() && keys.times[key] < ticks &&
@@ -135,7 +135,7 @@ double valueWithin(const CurveKeys& keys, std::int64_t ticks, CurveCursor& curso
 
 enum class Side { before, after };
 
-/// A time outside the keys as a time within them, and how many repetitions away it is.
+/// A time outside the keys mapped into them, and how many repetitions away it is.
 struct Repetition {
     std::uint64_t number;
     std::uint64_t offset; ///< from the first key, less than the length of the keys
@@ -152,7 +152,7 @@ Repetition repetitionOf(std::int64_t first, std::uint64_t length, std::int64_t t
     return {(distance - 1) / length + 1, rest == 0 ? 0 : length - rest};
 }
 
-/// What remains when the repetitions are used up: the end of the last one.
+/// The value when the repetitions are used up: the end of the last one.
 double valueAfterRepetitions(const CurveKeys& keys, const Extrapolation& extrapolation, Side side) {
     const double first = valueOf(keys, 0);
     const double last = valueOf(keys, keys.keyCount() - 1);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What tangents and evaluation both ask about the piece of a curve between two keys.
+// The common part of tangents and evaluation: the piece of a curve between two keys.
 #pragma once
 
 #include <fbxsdk/FbxTime.h>
@@ -11,7 +11,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// A segment is interpolated as its left key says. Flags that say nothing mean constant.
+/// A segment is interpolated by its left key. Flags without an interpolation mean constant.
 enum class Interpolation { constant, constantNext, linear, cubic };
 
 [[nodiscard]] inline Interpolation interpolationOf(const CurveKeys& keys, std::size_t key) {
@@ -28,7 +28,7 @@ enum class Interpolation { constant, constantNext, linear, cubic };
 /// With this weight on both sides a weighted cubic is the plain Hermite one.
 constexpr double kEqualWeight = 1.0 / 3.0;
 
-/// The lengths of a key's handles as parts of their segments, within 0.0001 to 0.99; a third when not weighted.
+/// The lengths of a key's handles as fractions of their segments, within 0.0001 to 0.99; a third when not weighted.
 [[nodiscard]] double rightWeight(const CurveKeys& keys, std::size_t key);
 [[nodiscard]] double leftWeight(const CurveKeys& keys, std::size_t key);
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Slopes in force, for those who look at curves.
+// Effective slopes, for display.
 #include <fbxsdk/extensions/CurveSlopes.h>
 
 #include "animation/CurveEvaluation.h"

@@ -3,11 +3,11 @@
 //
 // Slopes of curves at their keys. User tangents are stored; auto and TCB tangents (Kochanek and Bartels, "Interpolating
 // Splines with Local Tension, Continuity, and Bias Control") follow from the keys on both sides. Which formula holds
-// for a key's left side is said by the key's own flags, the numbers for it stand with the key before.
+// for a key's left side is determined by the key's own flags; its numbers are stored with the key before.
 //
-// What stored numbers mean next to auto tangents was found with files of MotionBuilder, which keeps the tangent's
-// handle where its user put it: a bias is positive toward its own side, left and right alike, and keys that are
-// independent of time have none (their number on the left repeats the slope or the shift that the flag stands for).
+// The meaning of stored numbers next to auto tangents was determined with files of MotionBuilder, which keeps the
+// tangent's handle where its user put it: a bias is positive toward its own side, left and right alike, and keys that
+// are independent of time have none (their number on the left repeats the slope or the shift that the flag represents).
 #include "animation/CurveEvaluation.h"
 
 #include <cmath>
@@ -19,14 +19,14 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Neighbours whose values differ by no more count as equal to a clamped tangent.
+/// Adjacent values that differ by no more count as equal to a clamped tangent.
 constexpr double kClampThreshold = 1.0e-5;
 
-/// From this bias on, in percent, an amount is added that does not depend on the neighbours.
+/// From this bias on, in percent, an amount is added that does not depend on the adjacent keys.
 constexpr double kAbsoluteBias = 500.0;
 constexpr double kAbsoluteBiasSlope = 40.0; ///< per second, for every 100 percent squared
 
-/// What the formulas see of the neighbours of a key. At an end both chords are the one that exists.
+/// The formulas' view of a key's adjacent keys. At an end both chords are the one that exists.
 struct Neighbourhood {
     double leftRise = 0.0; ///< value minus that of the key before
     double leftSeconds = 0.0;
@@ -71,13 +71,13 @@ double biased(double slope, double bias, const Neighbourhood& n) {
     double result = slope + (target - slope) * percent / 100.0;
     if (percent > kAbsoluteBias) {
         const double excess = (percent - kAbsoluteBias) / 100.0;
-        const double turn = n.rightChord >= n.leftChord ? 1.0 : -1.0; // the way from the left chord to the right one
+        const double turn = n.rightChord >= n.leftChord ? 1.0 : -1.0; // from the left chord to the right one
         result += std::copysign(kAbsoluteBiasSlope, bias) * turn * excess * excess;
     }
     return result;
 }
 
-/// Shortens a slope so that a handle of that many seconds does not leave the neighbour's value.
+/// Shortens a slope so that a handle of that many seconds does not exceed the adjacent value.
 double limited(double slope, double rise, double handleSeconds) {
     if (!(slope * rise > 0.0)) {
         return 0.0;
@@ -95,7 +95,7 @@ bool isTimeIndependent(std::uint32_t flags) {
     return (flags & (KeyFlag::genericTimeIndependent | KeyFlag::genericClampProgressive)) != 0;
 }
 
-/// The slope of an auto tangent; the bias counts toward the right.
+/// The slope of an auto tangent; the bias is positive to the right.
 double autoSlope(const CurveKeys& keys, std::size_t key, double bias) {
     const std::uint32_t flags = keys.attributesOf(key).flags;
     const bool progressive = (flags & KeyFlag::genericClampProgressive) != 0;
@@ -123,7 +123,7 @@ double autoSlope(const CurveKeys& keys, std::size_t key, double bias) {
     return slope;
 }
 
-/// The slopes of a TCB tangent. At an end the missing chord counts as none and the other one in full.
+/// The slopes of a TCB tangent. At an end the missing chord counts as zero and the other one in full.
 struct TcbSlopes {
     double left;
     double right;
@@ -155,8 +155,8 @@ Tangent tangentOf(const KeyAttributes& attributes) {
     return (flags & KeyFlag::tangentAuto) != 0 ? Tangent::automatic : Tangent::stored;
 }
 
-/// The number kept for the left side of a key. The first key has none, nor has one behind a TCB key, where the place
-/// holds the continuity: they are smooth, so the number of the right side says it (a bias with the other sign).
+/// The number stored for the left side of a key. The first key has none, nor has one after a TCB key, where that number
+/// is the continuity: they are smooth, so the number of the right side is used (a bias with the other sign).
 double storedLeft(const CurveKeys& keys, std::size_t key, Tangent tangent) {
     if (key > 0 && tangentOf(keys.attributesOf(key - 1)) != Tangent::tcb) {
         return static_cast<double>(keys.attributesOf(key - 1).data[KeyData::nextLeftSlope]);
@@ -245,7 +245,7 @@ double rightSlope(const CurveKeys& keys, std::size_t key) {
 }
 
 double leftSlope(const CurveKeys& keys, std::size_t key) {
-    const std::size_t segment = key > 0 ? key - 1 : key; // the first key: as if the curve came from before
+    const std::size_t segment = key > 0 ? key - 1 : key; // the first key: as if the curve started earlier
     const bool cubic = interpolationOf(keys, segment) == Interpolation::cubic;
     return finiteOrFlat(cubic ? cubicLeftSlope(keys, key) : straightSlope(keys, segment));
 }

@@ -41,7 +41,7 @@ std::size_t placeOf(const detail::CurveKeys& keys, std::int64_t ticks) {
     return static_cast<std::size_t>(found - keys.times.begin());
 }
 
-/// Takes the key at the index out and puts it back where its new time belongs; a key already at that time gives way.
+/// Removes the key at the index and inserts it at its new time; a key already at that time is replaced.
 void moveKey(detail::CurveKeys& keys, std::size_t index, std::int64_t ticks) {
     const float value = keys.values[index];
     const std::uint32_t attribute = keys.attributeOfKey[index];
@@ -95,7 +95,7 @@ void FbxAnimCurve::setSource(std::shared_ptr<const detail::Document> document, c
     mState.reset();
     mDocument = std::move(document);
     mSource = &object;
-    // A file that is changed meanwhile fails its import, not some evaluation later on.
+    // A file that is changed meanwhile fails its import, not a later evaluation.
     if (standsInFile(object))
         static_cast<void>(state());
 }
@@ -123,8 +123,8 @@ void FbxAnimCurve::KeyModifyBegin() {}
 
 void FbxAnimCurve::KeyModifyEnd() {
     if (!mState)
-        return; // guards call this where memory for the first key is missing
-    // No more keys for now: the lists give back what they grew by.
+        return; // called by guards where memory for the first key is missing
+    // No more keys for now: the lists release their spare capacity.
     detail::CurveKeys& keys = mState->keys;
     keys.times.shrink_to_fit();
     keys.values.shrink_to_fit();
@@ -144,7 +144,7 @@ int FbxAnimCurve::KeyGetCount() const { return static_cast<int>(keys().keyCount(
 int FbxAnimCurve::KeyAdd(FbxTime pTime, int* pLast) {
     detail::CurveKeys& keys = editKeys();
     const std::int64_t ticks = pTime.Get();
-    // Keys mostly come in order: the end is tried first.
+    // Keys usually come in order: the end is tried first.
     auto place = keys.times.size();
     if (keys.times.empty() || keys.times.back() < ticks) {
         keys.times.push_back(ticks);
@@ -194,7 +194,7 @@ float FbxAnimCurve::Evaluate(FbxTime pTime, int* pLast) {
 
 namespace {
 
-/// The time at a part, 0 to 1, of the way from one to a later one; they may be further apart than ticks can count.
+/// The time at a fraction, 0 to 1, from one time to a later one; they may be further apart than ticks can count.
 std::int64_t ticksBetween(std::int64_t from, std::int64_t to, double part) {
     const std::uint64_t length = static_cast<std::uint64_t>(to) - static_cast<std::uint64_t>(from);
     const double steps = std::min(std::round(part * static_cast<double>(length)), 18446744073709549568.0);
@@ -232,7 +232,7 @@ FbxAnimCurveBase::EExtrapolationType FbxAnimCurve::GetPostExtrapolation() const 
 
 namespace {
 
-/// The interface counts without sign and has 0 for "without end".
+/// The interface is unsigned, with 0 for "endless".
 std::int32_t toCount(unsigned long count) {
     return count == 0 || count > static_cast<unsigned long>(INT32_MAX) ? -1 : static_cast<std::int32_t>(count);
 }

@@ -21,7 +21,7 @@ FbxAnimCurveNode::~FbxAnimCurveNode() = default;
 
 namespace {
 
-/// So many channels are searched one by one; more get an index.
+/// Up to this many channels are searched one by one; more get an index.
 constexpr std::size_t kSearchedChannels = 8;
 
 } // namespace
@@ -173,8 +173,8 @@ void FbxAnimCurveNode::connectionChanged(FbxObject& pSource, FbxObject& pDestina
     FbxObject::connectionChanged(pSource, pDestination, pConnected);
     if (pConnected || &pDestination != this)
         return;
-    // A curve that is cut off (or dies) must not linger in a channel. It may be past its own destructor's body, so
-    // it is compared by address only.
+    // A curve that is disconnected (or destroyed) must not stay in a channel. It may be past its own destructor's body,
+    // so it is compared by address only.
     if (mUses.erase(&pSource) == 0)
         return;
     for (Channel& channel : mChannels) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Animation stacks: the spans are four stored times and nothing else.
+// Animation stacks: the spans are four stored times.
 #include <fbxsdk/FbxAnimStack.h>
 
 #include "object/ManagerData.h"

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Candidates are tried against all times; the first that fits is made precise with the time that lies furthest out.
+// Candidates are tested with all times; the first that fits is refined with the time furthest from zero.
 #include "animation/FrameRateOfTimes.h"
 
 #include <algorithm>
@@ -19,7 +19,7 @@ constexpr double kTicksPerSecond = 46186158000.0;
 
 /// How far from a whole frame, in frames, a time still counts as that frame.
 constexpr double kFrameTolerance = 0.01;
-/// The part of the times that must be whole frames: a few keys between frames do not change the rate.
+/// The fraction of the times that must be whole frames: a few keys between frames do not change the rate.
 constexpr double kFittingPart = 0.9;
 
 constexpr double kSlowest = 12.0;
@@ -27,7 +27,7 @@ constexpr double kFastest = 1000.0;
 constexpr double kUsualRates[] = {30.0, 24.0, 25.0,  29.97, 23.976,       60.0,  50.0,
                                   48.0, 15.0, 59.94, 120.0, 119.88010468, 100.0, 1000.0};
 
-/// Rates closer than a float can tell are the same: hosts keep their rate in one.
+/// Rates that a float cannot distinguish are equal: hosts keep their rate in one.
 constexpr double kSameRate = 1.5e-7;
 
 double framesAt(std::int64_t ticks, double rate) { return static_cast<double>(ticks) / kTicksPerSecond * rate; }
@@ -42,7 +42,7 @@ bool fits(std::span<const std::int64_t> times, double rate) {
     return static_cast<double>(whole) >= kFittingPart * static_cast<double>(times.size());
 }
 
-/// The distance that most neighbours have, give or take the rounding to whole ticks; 0 without neighbours.
+/// The most frequent distance between adjacent times, up to rounding to whole ticks; 0 without any.
 double usualDistance(std::span<const std::int64_t> times) {
     std::vector<std::uint64_t> distances;
     for (std::size_t i = 1; i < times.size(); ++i)
@@ -64,7 +64,7 @@ double usualDistance(std::span<const std::int64_t> times) {
     return usual;
 }
 
-/// The same rate measured over the longest way: the time furthest from 0 that is a whole frame.
+/// The same rate measured over the longest distance: the time furthest from 0 that is a whole frame.
 double measured(std::span<const std::int64_t> times, double rate) {
     double furthest = 0.0, frames = 0.0;
     for (const std::int64_t time : times) {
@@ -77,7 +77,7 @@ double measured(std::span<const std::int64_t> times, double rate) {
     return frames != 0.0 ? frames * kTicksPerSecond / furthest : rate;
 }
 
-/// The rate that was meant: a usual one, a decimal fraction, or one slowed down by 1000/1001.
+/// The intended rate: a usual one, a decimal fraction, or one slowed down by 1000/1001.
 double meantRate(double rate) {
     const auto isMeant = [&](double candidate) { return std::abs(rate / candidate - 1.0) <= kSameRate; };
     const double slowed = std::round(rate * 1.001) / 1.001;

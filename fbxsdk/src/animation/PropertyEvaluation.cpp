@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How animation layers combine. The base layer replaces the property's static value; each further layer adds to what is
-// there, or overrides it, by its weight. Rotations compose and scales multiply unless the layer says otherwise.
+// How animation layers combine. The base layer replaces the property's static value; each further layer adds to the
+// value so far, or overrides it, by its weight. Rotations compose and scales multiply by default.
 #include "animation/PropertyEvaluation.h"
 
 #include <algorithm>
@@ -42,7 +42,7 @@ LayerContribution contributionOf(FbxAnimLayer& layer, const FbxAnimCurveNode& cu
     return contribution;
 }
 
-/// What the layer says for each component: its curve's value, or the channel's where it has none.
+/// The layer's value for each component: its curve's, or the channel's where it has none.
 Components layerValue(LayerContribution& contribution, const FbxTime& time) {
     Components value = contribution.values;
     for (std::size_t i = 0; i < value.size(); ++i) {
@@ -64,7 +64,7 @@ double weightOf(FbxAnimLayer& layer, const FbxTime& time) {
     return weight > 0.0 ? std::min(weight, 1.0) : 0.0; // NaN counts as 0
 }
 
-/// A factor of partial weight: 1 at weight 0, the factor itself at weight 1, keeping its sign between.
+/// A factor of partial weight: 1 at weight 0, the factor itself at weight 1, keeping its sign in between.
 double weightedFactor(double factor, double weight) {
     if (weight >= 1.0)
         return factor;

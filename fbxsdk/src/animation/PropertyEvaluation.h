@@ -21,7 +21,7 @@ using Components = std::array<double, 4>;
 /// How the layers of a property combine, from the property's name.
 enum class LayerRule { sum, rotation, scaling };
 
-/// One layer that has a say for a property.
+/// One layer that contributes to a property.
 struct LayerContribution {
     FbxAnimLayer* layer = nullptr;
     bool base = false;                        ///< the stack's first layer: it replaces the static value
@@ -40,8 +40,8 @@ struct AnimatedProperty {
     [[nodiscard]] bool animated() const { return !contributions.empty(); }
 };
 
-/// Looks up the layers of the stack that animate the property; muted layers are left out, and when any layer of the
-/// stack is solo all that are not. A null stack gives the static value alone.
+/// Looks up the layers of the stack that animate the property; muted layers are omitted, and when any layer of the
+/// stack is solo all that are not. A null stack gives the static value.
 AnimatedProperty bindAnimation(const FbxProperty& property, FbxAnimStack* stack);
 
 /// The value at the time. The rotation order matters to layers that compose rotations.

@@ -61,7 +61,7 @@ void addFault(CacheFacts& facts, const std::string& file, std::uint64_t offset, 
     }
 }
 
-/// The length of a name is whatever the file says.
+/// The length of a name is taken from the file and is arbitrary.
 std::string channelText(std::string_view name) {
     constexpr std::size_t kMostBytes = 200;
     const bool isWhole = name.size() <= kMostBytes;
@@ -206,7 +206,7 @@ private:
         return times;
     }
 
-    /// Every time that the description promises has a sample of the channel.
+    /// Checks that the channel has a sample at every time of the description.
     void checkTimes(const detail::MayaCacheChannel& channel, const std::vector<double>& frames) {
         if (frames.empty()) {
             fault(mFacts.description, 0, channelText(channel.name) + ": no sample of it");
@@ -293,7 +293,7 @@ void readMaxFacts(const std::string& name, std::span<const char> bytes, bool ver
     }
 }
 
-// ---- Which it is ----
+// ---- Detecting the kind ----
 
 /// The description that a data file belongs to: that of its own name, or without "Frame12" at the end.
 std::string descriptionOf(const std::string& dataFile) {

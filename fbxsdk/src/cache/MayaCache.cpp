@@ -47,7 +47,7 @@ private:
 
 constexpr std::string_view kFloatVectors = "FloatVectorArray";
 
-/// The number at the front of the text, which is cut off. False when there is none.
+/// The number at the front of the text, which is removed from it. False when there is none.
 bool takeNumber(std::string_view& text, std::int64_t& number) {
     const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
     if (error != std::errc())

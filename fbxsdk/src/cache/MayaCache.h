@@ -62,8 +62,8 @@ public:
     MayaCacheWriter(const std::string& descriptionFile, const MayaCacheDescription& description,
                     FileOperations& operations);
 
-    /// Appends a sample. Times must ascend for readers that do not sort. False without a fault for a channel that there
-    /// is not.
+    /// Appends a sample. Times must ascend for readers that do not sort. False without a fault for a channel that does
+    /// not exist.
     [[nodiscard]] bool write(std::size_t channel, double seconds, std::span<const double> points, FbxStatus& status);
     /// Completes the data file and the description.
     [[nodiscard]] bool close(FbxStatus& status);

@@ -46,11 +46,11 @@ struct MayaCacheFrame {
 
 struct MayaCacheData {
     std::vector<MayaCacheFrame> frames;
-    /// The offset at which the file is truncated or damaged; its size when it is sound.
+    /// The offset at which the file is truncated or damaged; its size when it is valid.
     std::size_t end = 0;
 };
-/// Cuts a data file into its frames. Zeros behind the last one are no damage. Where the bytes are those of a file, they
-/// are fetched, except the numbers. Throws FileFault.
+/// Parses a data file into its frames. Zeros after the last one are no damage. Where the bytes are those of a file,
+/// they are fetched, except the numbers. Throws FileFault.
 [[nodiscard]] MayaCacheData parseMayaCacheData(std::span<const char> bytes, const FileBytes* file = nullptr);
 
 /// Reads the first points of a block, widened to double or narrowed to float. False when the block is no vector array

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The description of a Maya cache: the .xml file that says which channels there are, when they start and end, and how
-// the data files are named and laid out.
+// The description of a Maya cache: the .xml file with its channels, their start and end, and the names and
+// layout of the data files.
 #pragma once
 
 #include <cstdint>

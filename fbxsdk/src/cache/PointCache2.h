@@ -50,7 +50,7 @@ public:
 
     /// Writes the sample of a frame to its place. False without a fault for a frame outside the samples.
     [[nodiscard]] bool write(double frame, const double* points, FbxStatus& status);
-    /// Fills up missing samples at the end, so that the file has the size that its header promises.
+    /// Appends missing samples at the end, so that the file has the size stated in its header.
     [[nodiscard]] bool close(FbxStatus& status);
     /// The same, but the file keeps its temporary name.
     [[nodiscard]] bool complete(FbxStatus& status);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How an ASCII file begins.
+// The detection of ASCII files and of their version.
 #include "container/AsciiPreamble.h"
 
 #include <algorithm>

@@ -7,8 +7,8 @@
 //     record := name ':' [ value { ',' value } ] [ '{' { record } '}' ]
 //     value  := text | number | word | '*' count '{' 'a' ':' number { ',' number } '}'
 //
-// Blanks, line ends and comments (from ';' to the end of the line) may stand between any two tokens, and a comma too
-// many means nothing. So the values of a record end where a token follows that is a brace or has a colon behind it.
+// Blanks, line ends and comments (from ';' to the end of the line) may occur between any two tokens, and surplus commas
+// are ignored. So the values of a record end where a token follows that is a brace or has a colon behind it.
 #include "container/AsciiReader.h"
 
 #include <algorithm>
@@ -29,7 +29,7 @@ namespace detail {
 
 namespace {
 
-/// More than there can be: stands for a count beyond all whole numbers.
+/// Larger than any valid count: represents a count beyond all whole numbers.
 constexpr std::int64_t kMostNumbers = std::numeric_limits<std::int64_t>::max();
 
 std::string decodeEntities(std::string_view text) {
@@ -114,7 +114,7 @@ private:
     const char* mNext;
     RecordTree& mTree;
     FbxStatus& mStatus;
-    std::uint32_t mArrayVersion = 0; ///< how arrays are to be understood
+    std::uint32_t mArrayVersion = 0; ///< the interpretation of arrays
     std::vector<OpenBlock> mOpen;
     std::vector<Value> mValues; ///< of the current record
 };
@@ -129,7 +129,7 @@ bool AsciiReader::failUnexpected(const char* place, const std::string& expected)
     return fail(place, "expected " + expected + " instead of '" + token + "'");
 }
 
-/// A byte of zero within a name or word comes from a damaged disk or copy; what stands there is lost. False when there
+/// A zero byte within a name or word comes from a damaged disk or copy; the original content is lost. False when there
 /// is one.
 bool AsciiReader::refuseZeros(std::string_view token) {
     const std::size_t zero = token.find('\0');
@@ -145,7 +145,7 @@ const char* AsciiReader::itemEnd() const {
     return quote != mEnd ? quote + 1 : nullptr;
 }
 
-/// The colon behind what comes next and ends there: a record starts, where otherwise a value might stand. Null when
+/// The colon behind what comes next and ends there: a record starts, where a value could follow otherwise. Null when
 /// there is none.
 const char* AsciiReader::nameColon(const char* end) const {
     if (end == nullptr || end == mNext) {
@@ -257,7 +257,7 @@ bool AsciiReader::openBlock(Record& record) {
     return true;
 }
 
-/// The tree's version stays what the comment says; how to read arrays has to be known before the document is.
+/// The tree's version stays that of the comment; the interpretation of arrays must be known before the document is.
 void AsciiReader::noteVersion(const Record& record) {
     if (mTree.version == 0 && record.name == "FBXVersion" && mOpen.back().record->name == "FBXHeaderExtension") {
         mArrayVersion =
@@ -291,7 +291,7 @@ bool AsciiReader::readValues(Record& record) {
     return true;
 }
 
-/// Takes the values as one array if they are many and nothing but numbers. Otherwise leaves them to be read singly.
+/// Takes the values as one array if they are many and all numbers. Otherwise leaves them to be read singly.
 bool AsciiReader::readNumberList(Record& record) {
     const char* const start = mNext;
     if (start == mEnd || *start == '"' || *start == '*') {
@@ -348,7 +348,7 @@ bool AsciiReader::readBareValue(const char* end, Value& value) {
     if (chars::is(chars::digit, token.front()) || std::string_view("+-.").find(token.front()) != token.npos) {
         return failUnexpected(start, "a number");
     }
-    // A word behind a text is a name that lost its quotes; nobody knows where it should have ended.
+    // A word behind a text is a name that lost its quotes; its end cannot be determined.
     if (token.size() > 1 && !mValues.empty() && mValues.back().type == Value::Type::text) {
         return failUnexpected(start, "a quoted text");
     }
@@ -357,7 +357,7 @@ bool AsciiReader::readBareValue(const char* end, Value& value) {
 }
 
 /// The count behind the asterisk is not needed, and lists that are shorter are read as they are. A list that is longer
-/// has fallen apart: with the decimal comma of some countries each number counts as two.
+/// is inconsistent: with the decimal comma of some countries each number counts as two.
 bool AsciiReader::readArray(const Record& record, Value& value) {
     ++mNext;
     const std::string_view count = readToken();

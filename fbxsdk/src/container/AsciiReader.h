@@ -11,7 +11,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Cuts the bytes into the tree's records and fills in its version. False with a sentence in the status.
+/// Parses the bytes into the tree's records and sets its version. On failure false, with a message in the status.
 [[nodiscard]] bool readAscii(std::span<const char> bytes, RecordTree& tree, FbxStatus& status);
 
 } // namespace detail

@@ -17,7 +17,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// What is handed on at a time.
+/// Bytes that are passed on at a time.
 constexpr std::size_t kFlushBytes = std::size_t{1} << 16;
 /// Lines of arrays are broken behind the first comma beyond this length …
 constexpr std::size_t kArrayLine = 2000;
@@ -161,7 +161,7 @@ void AsciiSink::text(std::string_view value) {
 }
 
 void AsciiSink::raw(std::span<const char> bytes) {
-    // Bytes stand on a line of their own, behind a comma that separates nothing.
+    // Bytes are on a line of their own, behind a comma that separates nothing.
     separate(/*beforeText*/ false);
     mText += ",\n \"";
     appendBase64(mText, bytes);

@@ -13,8 +13,8 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// The layout is the usual one down to the blanks: some readers go line by line. Numbers are written in the shortest
-/// form that reads back the same; what is no number at all is written as 0, since hardly a reader takes anything else.
+/// The layout is the usual one including blanks: some readers parse by lines. Numbers are written in the shortest form
+/// that reads back the same; NaN and infinity are written as 0, since hardly any reader accepts another spelling.
 class AsciiSink final : public RecordSink {
 public:
     /// Writes the comment that states the version.
@@ -71,7 +71,7 @@ private:
     ByteOutput& mOutput;
     std::uint32_t mVersion;
     std::vector<OpenRecord> mOpen;
-    std::string mText;          ///< not handed on yet
+    std::string mText;          ///< not passed on yet
     std::size_t mLineStart = 0; ///< of the line being written, within mText
 };
 

@@ -6,8 +6,8 @@
 //     EndOffset  ValueCount  ValueBytes  NameLength  name  values  [records  null record]
 //     |-- 32 bits each, 64 from 7500 on --|  8 bits               |- if EndOffset lies further -|
 //
-// and offsets count from the start of the file. Nothing is trusted: each size is held against the bytes that are left
-// of the file, of the block around the record, or of the record itself, before anything is allocated.
+// and offsets count from the start of the file. Nothing is trusted: each size is compared with the remaining bytes
+// of the file, of the enclosing block, or of the record itself, before anything is allocated.
 #include "container/BinaryReader.h"
 
 #include <algorithm>
@@ -34,9 +34,9 @@ constexpr std::size_t kHeaderSize = 27;
 /// Deflate's ratio holds for long streams; a short one may have a few bytes more for its head.
 constexpr std::uint64_t kDeflateSlack = 1024;
 
-/// All compressed arrays of a file together may stand for so many bytes per byte of the file, as doubles, and for
-/// so many more. Real files stay below a tenth of the first; without a bound, a megabyte of crafted zeros could ask
-/// for a gigabyte.
+/// All compressed arrays of a file together may expand to this many bytes per byte of the file, as doubles, plus
+/// a constant. Real files stay below a tenth of the first; without a bound, a megabyte of crafted zeros could expand
+/// to a gigabyte.
 constexpr std::uint64_t kMaxExpansion = 512;
 constexpr std::uint64_t kFreeExpansion = std::uint64_t{32} << 20;
 
@@ -137,7 +137,7 @@ private:
     bool mSwap = false;
     bool mWide = false; ///< 64-bit record heads
     std::size_t mOffset = 0;
-    std::uint64_t mExpanded = 0; ///< bytes that the compressed arrays so far stand for, as doubles
+    std::uint64_t mExpanded = 0; ///< expanded size of the compressed arrays so far, as doubles
     std::vector<OpenBlock> mOpen;
 };
 
@@ -157,8 +157,8 @@ bool BinaryReader::readHeader() {
     return true;
 }
 
-// The top level ends with a null record as every block does. What comes behind it, a footer and in old files a second
-// list of records, says nothing that the first does not.
+// The top level ends with a null record as every block does. What follows it, a footer and in old files a second
+// list of records, adds nothing to the first.
 bool BinaryReader::readRecords() {
     mOpen.push_back({&mTree.root, nullptr, mBytes.size()});
     while (!mOpen.empty()) {
@@ -228,7 +228,7 @@ bool BinaryReader::readRecord(const Head& head, std::size_t start) {
     record.location = start;
     mOffset += head.nameLength;
 
-    // Some writers lost the end of records without a block: such a record ends with its values.
+    // Some writers omit the end of records without a block: such a record ends with its values.
     const std::size_t valuesEnd = mOffset + static_cast<std::size_t>(head.valueBytes);
     if (head.end != 0 && (head.end < valuesEnd || head.end > blockEnd)) {
         return fail(start, "end offset " + std::to_string(head.end) + " of record '" + std::string(record.name) +
@@ -273,7 +273,7 @@ bool BinaryReader::readValues(Record& record, const Head& head, std::size_t end)
     return true;
 }
 
-/// The usual values, of bytes that were fetched. False, with nothing done, for all others and for faulty ones.
+/// Reads a value of a usual type, whose bytes were fetched. False, with nothing done, for other and faulty ones.
 bool BinaryReader::readPlainValue(Value& value, std::size_t end) {
     if (mOffset == end) {
         return false;

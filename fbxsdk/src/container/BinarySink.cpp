@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Binary files. The head of a record tells where the record ends, which is known only behind it: a head is written
-// empty first and filled in when its record ends. BinaryReader.cpp draws the layout.
+// Binary files. The head of a record states where the record ends, which is known only after writing it: a head is
+// written empty first and filled in when its record ends. BinaryReader.cpp draws the layout.
 #include "container/BinarySink.h"
 
 #include <cassert>
@@ -20,7 +20,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Raw bytes from which on an array is compressed. The applications draw the line here too.
+/// Size in bytes from which on an array is compressed. The applications use the same limit.
 constexpr std::size_t kShortestCompressed = 1024;
 constexpr std::size_t kFooterAlignment = 16;
 constexpr std::size_t kFooterZeros = 120;
@@ -139,7 +139,7 @@ void BinarySink::patchHead(const OpenRecord& record) {
     }
 }
 
-/// An offset or a count as heads have them; how many bytes that is.
+/// Size in bytes of an offset or a count in heads.
 std::size_t BinarySink::storeOffset(char* bytes, std::uint64_t offset) const {
     if (mWide) {
         storeNumber(bytes, offset);
@@ -149,8 +149,8 @@ std::size_t BinarySink::storeOffset(char* bytes, std::uint64_t offset) const {
     return sizeof(std::uint32_t);
 }
 
-// What takes long is to deflate arrays. Each part becomes a fragment of a file with offsets of its own, to which the
-// place where it comes to stand is added in the end: the bytes are those of parts that are written one after the other.
+// Most of the time is spent deflating arrays. Each part becomes a fragment of a file with offsets of its own, to which
+// its final position is added at the end: the bytes are the same as when the parts are written one after the other.
 void BinarySink::parts(std::span<const Part> list) {
     assert(mOpen.empty() || mOpen.back().hasBlock);
     if (extensions::maximumThreads() == 1) {

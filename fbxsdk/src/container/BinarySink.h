@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Records as binary files hold them.
 #pragma once
 
 #include <string>
@@ -15,12 +13,13 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// The largest file that 32-bit record heads are trusted with: many readers take their offsets for signed.
+/// The largest file with 32-bit record heads: many readers treat their offsets as signed.
 inline constexpr std::uint64_t kMaxNarrowFileSize = 0x7FFFFFFF;
 
+/// Records as binary files hold them.
 class BinarySink final : public RecordSink {
 public:
-    /// Writes the file's header. Record heads are 64 bits wide from version 7500 on; below, a file that outgrows
+    /// Writes the file's header. Record heads are 64 bits wide from version 7500 on; below, a file that exceeds
     /// `maxNarrowSize` is a fault.
     BinarySink(ByteOutput& output, std::uint32_t version, std::uint64_t maxNarrowSize = kMaxNarrowFileSize);
 
@@ -50,14 +49,14 @@ public:
     void parts(std::span<const Part> list) override;
 
     [[nodiscard]] bool failed() const override { return !mFault.empty() || mOutput.failed(); }
-    /// What cannot be written in this version; empty when nothing is wrong but perhaps the output.
+    /// What cannot be written in this version; empty when nothing but perhaps the output failed.
     [[nodiscard]] const std::string& fault() const { return mFault; }
 
     /// Ends the last list of records and writes the footer. All records must be ended.
     void finish(const CreationTime& time);
 
 private:
-    /// For records that will stand somewhere in the file of another sink.
+    /// For records that will be inserted into the file of another sink.
     BinarySink(ByteOutput& output, const BinarySink& whole);
 
     struct OpenRecord {

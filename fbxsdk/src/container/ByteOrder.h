@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Numbers out of unaligned bytes of either byte order.
+// Reading numbers from unaligned bytes of either byte order.
 #pragma once
 
 #include <bit>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Where sinks put bytes: a growing sequence of which a written part may be changed once more.
+// The output of sinks: a growing sequence of bytes of which a written part may be changed once more.
 #pragma once
 
 #include <cassert>
@@ -16,7 +16,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// After a fault everything is ignored, so that callers need to ask only now and then, and at the end.
+/// After a fault everything is ignored, so that callers need to check only occasionally, and at the end.
 class ByteOutput {
 public:
     ByteOutput() = default;
@@ -44,7 +44,7 @@ public:
     [[nodiscard]] bool failed() const override { return false; }
 
     [[nodiscard]] const std::string& bytes() const { return mBytes; }
-    /// Leaves none.
+    /// Empties it.
     [[nodiscard]] std::string takeBytes() { return std::exchange(mBytes, {}); }
 
 private:

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files by positioned reads into memory that is reserved at once and taken page by page.
+// Files by positioned reads into memory that is reserved at once and committed page by page.
 #include "container/FileBytes.h"
 
 #include <algorithm>
@@ -29,7 +29,7 @@ namespace {
 
 class FileDescriptor {
 public:
-    // Opening a pipe must not wait for somebody to write into it.
+    // Opening a pipe must not block until it has a writer.
     explicit FileDescriptor(const std::string& fileName)
         : mNumber(::open(fileName.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK)) {}
     FileDescriptor(const FileDescriptor&) = delete;
@@ -59,8 +59,8 @@ bool isBefore(const timespec& a, const timespec& b) {
     return a.tv_sec != b.tv_sec ? a.tv_sec < b.tv_sec : a.tv_nsec < b.tv_nsec;
 }
 
-/// Files are stamped with a clock that stands still for some milliseconds at a time. One that was written in the moment
-/// in which it is opened might be written again without another stamp: such a file is looked at a moment later.
+/// Files are stamped with a clock that advances in steps of some milliseconds. One that was written in the very tick
+/// in which it is opened could be rewritten without another stamp: such a file is checked a moment later.
 bool settledFacts(int file, struct stat& facts) {
     constexpr int kMostTries = 20;
     constexpr timespec kMoment{0, 1'000'000};
@@ -76,7 +76,7 @@ bool settledFacts(int file, struct stat& facts) {
     return true;
 }
 
-/// Memory that costs nothing until it is written to.
+/// Memory that takes no pages until it is written to.
 std::span<char> reserve(std::size_t size) {
     void* const memory =
         ::mmap(nullptr, size, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS | MAP_NORESERVE, -1, 0);
@@ -92,7 +92,7 @@ int waitForBytes(int pipe) {
     return ready == 0 ? ETIMEDOUT : 0;
 }
 
-/// Appends what comes through a pipe to the memory. The error number, EFBIG when it is more than that.
+/// Appends the content of a pipe to the memory. The error number, EFBIG when it is more than that.
 int readPipe(int pipe, std::span<char> memory, std::size_t& size) {
     for (size = 0; size < memory.size();) {
         const ssize_t count = ::read(pipe, memory.data() + size, std::min(memory.size() - size, std::size_t{1} << 20));
@@ -113,7 +113,7 @@ FileBytes::~FileBytes() {
     if (mFile >= 0)
         ::close(mFile);
     if (!mMemory.empty()) {
-        allow(mMemory); // whoever gets the pages next
+        allow(mMemory); // the next owner of the pages
         ::munmap(mMemory.data(), mMemory.size());
     }
 }
@@ -131,7 +131,7 @@ std::shared_ptr<const FileBytes> FileBytes::open(const std::string& fileName, Fb
     if (!S_ISREG(facts.st_mode) && !isPipe) {
         return refuse(fileName, "neither a regular file nor a pipe", status);
     }
-    const std::shared_ptr<FileBytes> opened(new FileBytes); // first, so that nothing can fail behind the reservation
+    const std::shared_ptr<FileBytes> opened(new FileBytes); // first, so that nothing can fail after the reservation
     opened->mName = fileName;
     std::size_t size = isPipe ? kMostPipeBytes : static_cast<std::size_t>(facts.st_size);
     if (size != 0) {
@@ -161,7 +161,7 @@ std::span<const char> FileBytes::tail() const {
 }
 
 bool FileBytes::contains(std::span<const char> part) const {
-    const std::less_equal<const char*> inOrder; // also for pointers that do not belong together
+    const std::less_equal<const char*> inOrder; // also for pointers into different objects
     const std::span<const char> all = bytes();
     return inOrder(all.data(), part.data()) && inOrder(part.data() + part.size(), all.data() + all.size());
 }
@@ -204,7 +204,7 @@ void FileBytes::requireUnchanged() const {
 }
 
 void ReadAhead::fetchUpTo(std::size_t offset, std::size_t end) {
-    // Bytes have their places from the beginning of a page on, and getting a page takes longer than filling it.
+    // Bytes are placed from the beginning of a page on, and getting a page takes longer than filling it.
     constexpr std::size_t kSmallestStep = std::size_t{1} << 9, kLargestStep = std::size_t{1} << 18, kPage = 1 << 12;
     mStep = offset > mEnd ? kSmallestStep : std::clamp(2 * mStep, kSmallestStep, kLargestStep);
     const std::size_t start = std::max(offset, mEnd);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The bytes of a file, read when somebody wants to look at them.
+// The bytes of a file, read on access.
 #pragma once
 
 #include <ctime>
@@ -16,14 +16,14 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Thrown where a file is not any more what it was when it was opened, or cannot be read any more. The text names the
+/// Thrown when a file has changed since it was opened, or cannot be read any more. The text names the
 /// file and says what happened.
 class FileFault : public std::runtime_error {
 public:
     using std::runtime_error::runtime_error;
 };
 
-/// What `work` returns; false when it meets such a file, and the status then has the reason.
+/// What `work` returns; false when it throws FileFault, and the status then has the reason.
 template <class Work>
 bool faultToStatus(FbxStatus& status, const Work& work) {
     try {
@@ -34,10 +34,10 @@ bool faultToStatus(FbxStatus& status, const Work& work) {
     }
 }
 
-/// A file that is open for as long as the object lives. Every byte has its place in memory from the start and comes
-/// there when it is fetched; what was fetched stays as it was read.
+/// A file that is open for as long as the object lives. Every byte has a fixed address from the start and is read
+/// there when it is fetched; fetched bytes do not change.
 ///
-/// Files are not mapped: whoever shortens a mapped file takes its pages away, and the next look at them ends the
+/// Files are not memory-mapped: shortening a mapped file removes its pages, and the next access to them ends the
 /// process.
 class FileBytes {
 public:
@@ -49,16 +49,16 @@ public:
     /// file nor a pipe, or is empty; the status then says which.
     [[nodiscard]] static std::shared_ptr<const FileBytes> open(const std::string& fileName, FbxStatus& status);
 
-    /// All bytes in their places. Only those that were fetched may be looked at.
+    /// All bytes at their addresses. Only those that were fetched may be accessed.
     [[nodiscard]] std::span<const char> bytes() const { return mMemory.first(mSize); }
 
-    /// Whether the bytes are some of these.
+    /// Whether the bytes are part of these.
     [[nodiscard]] bool contains(std::span<const char> part) const;
 
-    /// Brings some of the bytes to their places. Throws FileFault; what was there before is then still there.
+    /// Reads some of the bytes to their addresses. Throws FileFault; bytes fetched before are still valid then.
     void fetch(std::span<const char> part) const;
-    /// Reads some of the bytes, given by their places, to somewhere else. Throws FileFault, also when the file was
-    /// changed since it was opened: bytes of before and after do not belong together.
+    /// Reads some of the bytes, given by their addresses, to another place. Throws FileFault, also when the file was
+    /// changed since it was opened: bytes from before and after the change are never mixed.
     void read(std::span<const char> part, char* destination) const;
     /// Throws FileFault when the file was changed since it was opened.
     void requireUnchanged() const;
@@ -67,24 +67,24 @@ private:
     FileBytes() = default;
 
     void copy(std::span<const char> part, char* destination) const;
-    /// Memory behind what came through a pipe.
+    /// The memory of a pipe's content.
     [[nodiscard]] std::span<const char> tail() const;
 
     std::string mName;
-    int mFile = -1; ///< none once all bytes are there
+    int mFile = -1; ///< none once all bytes are in memory
     timespec mModified{};
     std::span<char> mMemory;
     std::size_t mSize = 0;
 };
 
-/// Fetches what a reader comes by that goes through a file from front to back, somewhat more at a time the longer it
-/// goes on without leaving anything out. Bytes of memory are there already.
+/// Fetches the bytes for a sequential reader, in portions that grow as long as it does not skip any.
+/// Bytes in memory need no fetching.
 class ReadAhead {
 public:
     ReadAhead(std::span<const char> bytes, const FileBytes* file)
         : mBytes(bytes), mFile(file), mEnd(file ? 0 : bytes.size()) {}
 
-    /// Before anybody looks at these bytes, which must be some of all. Throws FileFault.
+    /// To be called before these bytes are accessed, which must be part of the whole. Throws FileFault.
     void need(std::size_t offset, std::size_t size) {
         if (size > mEnd || offset > mEnd - size)
             fetchUpTo(offset, offset + size);
@@ -96,7 +96,7 @@ private:
 
     std::span<const char> mBytes;
     const FileBytes* mFile;
-    std::size_t mEnd; ///< up to where bytes are there
+    std::size_t mEnd; ///< the end of the fetched bytes
     std::size_t mStep = 0;
 };
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What readers and writers of both containers have to agree on: how files begin, which version says what how.
+// What readers and writers of both containers share: how files begin, and the versions at which the format changed.
 #pragma once
 
 #include <cstdint>
@@ -12,7 +12,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// How binary files begin. Behind the magic stand two bytes and the byte order: 0 is little-endian.
+/// How binary files begin. The magic is followed by two bytes and the byte order: 0 is little-endian.
 inline constexpr std::string_view kBinaryHead("Kaydara FBX Binary  \0\x1A\0", 23);
 inline constexpr std::string_view kBinaryMagic = kBinaryHead.substr(0, 20);
 
@@ -33,7 +33,7 @@ inline constexpr std::uint32_t kFirstWideVersion = 7500;
 inline constexpr std::string_view kBinaryNameSeparator("\0\1", 2);
 inline constexpr std::string_view kAsciiNameSeparator = "::";
 
-/// What stands for characters of texts in ASCII files. Nothing else does: "&amp;" and a lone "&" stand for themselves.
+/// The escapes of characters in texts of ASCII files. There are no others: "&amp;" and a lone "&" represent themselves.
 struct Entity {
     std::string_view spelling;
     char character;

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Both codes come from one chained exclusive-or over sixteen digits of the time. It gives the codes of every binary
-// file that was looked at, byte for byte.
+// Both codes come from one chained exclusive-or over sixteen digits of the time. It reproduces the codes of every
+// binary file that was examined, byte for byte.
 #include "container/FileId.h"
 
 #include <algorithm>
@@ -44,7 +44,7 @@ FileCode digitsOf(const CreationTime& time) {
     return digits;
 }
 
-/// Whole numbers with at least so many digits, each behind its separator.
+/// Whole numbers with at least that many digits, each behind its separator.
 struct TextPart {
     std::string_view separator;
     int number, digits;

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The time a file was made, and the two codes of binary files that follow from it: the FileId record and the first
-// bytes of the footer. Applications refuse files whose codes do not fit their time.
+// The time a file was made, and the two codes of binary files that are derived from it: the FileId record and the first
+// bytes of the footer. Applications refuse files whose codes do not match their time.
 #pragma once
 
 #include <array>
@@ -16,7 +16,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// A moment by calendar and clock.
+/// A date and time.
 struct CreationTime {
     int year = 1970, month = 1, day = 1;
     int hour = 0, minute = 0, second = 0, millisecond = 0;

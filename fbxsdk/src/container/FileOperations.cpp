@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The system calls of writing, with interruptions and short counts taken care of.
+// The system calls of writing, handling interruptions and short counts.
 #include "container/FileOperations.h"
 
 #include <cerrno>
@@ -19,7 +19,7 @@ namespace {
 
 int outcome(int result) { return result < 0 ? errno : 0; }
 
-/// Opens for writing. A pipe without a reader would block: it gets some time to find one.
+/// Opens for writing. A pipe without a reader would block: it is retried for a limited time.
 int openUnlessUnread(const std::string& path) {
     constexpr int kTries = 200;
     constexpr timespec kPause{0, 10'000'000}; // both together two seconds
@@ -37,7 +37,7 @@ int openUnlessUnread(const std::string& path) {
     return -1;
 }
 
-/// Repeats a system call until all bytes are through. `step` gets what is left and how much went before.
+/// Repeats a system call until all bytes are processed. `step` gets the rest and the number of bytes before it.
 template <class Byte, class Step>
 int transferAll(std::span<Byte> bytes, const Step& step) {
     std::size_t done = 0;
@@ -57,7 +57,7 @@ int transferAll(std::span<Byte> bytes, const Step& step) {
     return 0;
 }
 
-/// Keeps the signal of a broken pipe from this thread, and takes back one that arrived meanwhile.
+/// Blocks the signal of a broken pipe on this thread, and discards one that arrived meanwhile.
 class PipeSignalGuard {
 public:
     PipeSignalGuard() {
@@ -87,12 +87,12 @@ private:
 } // namespace
 
 int FileOperations::create(const std::string& path, unsigned permissions, int& file) {
-    constexpr mode_t kUsual = 0666; // less what the process masks
+    constexpr mode_t kUsual = 0666; // less the process's mask
     file = ::open(path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, kUsual);
     if (file < 0) {
         return errno;
     }
-    // Where the file system knows no permissions, the file is written all the same.
+    // Where the file system has no permissions, the file is written all the same.
     if (permissions != 0 && ::fchmod(file, static_cast<mode_t>(permissions)) != 0 && errno != EPERM &&
         errno != ENOTSUP) {
         const int error = errno;
@@ -136,13 +136,13 @@ int FileOperations::readAt(int file, std::uint64_t offset, std::span<char> bytes
 
 int FileOperations::flush(int file) {
     const int error = outcome(::fsync(file));
-    // What cannot be flushed at all, such as a device, has nothing to lose.
+    // What cannot be flushed at all, such as a device, cannot lose data.
     return error == EINVAL || error == ENOTSUP ? 0 : error;
 }
 
 int FileOperations::close(int file) {
     const int error = outcome(::close(file));
-    return error == EINTR ? 0 : error; // the descriptor is gone nevertheless
+    return error == EINTR ? 0 : error; // the descriptor is closed nevertheless
 }
 
 int FileOperations::rename(const std::string& from, const std::string& to) {

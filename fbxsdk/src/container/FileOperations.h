@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What writing a file asks of the system. Tests put a class in between that fails where they say.
+// The system's operations for writing a file. Tests substitute a class that fails at chosen places.
 #pragma once
 
 #include <cstddef>
@@ -22,12 +22,12 @@ public:
     /// Opens a file that must not be there yet, for reading too, with the usual permissions or, unless 0, with those
     /// given.
     virtual int create(const std::string& path, unsigned permissions, int& file);
-    /// Opens a pipe or a device. A pipe is waited for until somebody reads it, but not for ever.
+    /// Opens a pipe or a device. Waits for a reader of a pipe, for a limited time.
     virtual int openExisting(const std::string& path, int& file);
-    /// Writes all bytes. A reader that went away is an error, not a signal.
+    /// Writes all bytes. A closed reader is an error, not a signal.
     virtual int write(int file, std::span<const char> bytes);
     virtual int writeAt(int file, std::uint64_t offset, std::span<const char> bytes);
-    /// Reads as many bytes as there is room for; that there are fewer is an error.
+    /// Reads as many bytes as the buffer holds; fewer are an error.
     virtual int readAt(int file, std::uint64_t offset, std::span<char> bytes);
     /// Returns when the bytes are on the medium.
     virtual int flush(int file);
@@ -36,11 +36,11 @@ public:
     /// Gives a file a second name that must not be there yet.
     virtual int link(const std::string& file, const std::string& secondName);
     virtual int remove(const std::string& path);
-    /// Makes the names in a folder outlast a power cut; without an outcome, since not every file system can.
+    /// Makes the names in a folder survive a power failure; without a result, since not every file system can.
     virtual void flushFolder(const std::string& path);
 };
 
-/// The system itself.
+/// The system's own operations.
 [[nodiscard]] FileOperations& systemFileOperations();
 
 } // namespace detail

@@ -18,7 +18,7 @@ namespace detail {
     return found != nullptr ? static_cast<const char*>(found) : end;
 }
 
-/// Numbers of lines, from 1 on. Goes on from the last answer where it can.
+/// Line numbers, from 1 on. Continues from the last result where possible.
 class LineCounter {
 public:
     explicit LineCounter(std::span<const char> text) : mText(text) {}
@@ -44,7 +44,7 @@ public:
 
 private:
     std::span<const char> mText;
-    char mEnd = '\0'; ///< of a line; 0 until the first question
+    char mEnd = '\0'; ///< of a line; 0 until the first call
     std::size_t mOffset = 0;
     std::uint64_t mLine = 1; ///< at the offset
 };

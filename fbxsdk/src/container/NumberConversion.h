@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What happens when a number is asked for in another type than the file stores it in. Every case that C++ would leave
-// undefined is decided here.
+// The conversion of numbers to another type than the file stores. Every case that C++ leaves
+// undefined is defined here.
 #pragma once
 
 #include <bit>
@@ -15,7 +15,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Truncates toward zero; what lies beyond the type's range becomes its end, NaN becomes 0.
+/// Truncates toward zero; a value beyond the type's range becomes its end, NaN becomes 0.
 template <class Integer>
 [[nodiscard]] constexpr Integer truncateTo(double number) {
     // The powers of two at the ends of the range are exact doubles, the largest 64-bit number is not.
@@ -38,7 +38,7 @@ template <class Integer>
                                                         : static_cast<Integer>(number);
 }
 
-/// std::uint32_t as a destination stands for the bits of a 32-bit float.
+/// std::uint32_t as a destination means the bits of a 32-bit float.
 ///
 /// A double beyond the range of float becomes infinite, as IEEE 754 has it.
 template <class Destination, class Source>

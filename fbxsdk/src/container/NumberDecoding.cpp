@@ -22,7 +22,7 @@ namespace detail {
 
 namespace {
 
-/// The bits of a float travel as bits, so that no NaN loses its payload.
+/// The bits of a float are copied as bits, so that no NaN loses its payload.
 template <class Source, class Number>
 constexpr bool kSameBits = std::is_same_v<Source, Number> ||
                            (std::is_same_v<Source, float> && std::is_same_v<Number, std::uint32_t>);
@@ -65,7 +65,7 @@ void convertBytes(const StoredArray& array, const char* source, std::span<Number
     case StoredArray::Element::float64:
         return convertElements<double>(source, stride, swap, destination);
     case StoredArray::Element::text:
-        return; // never holds bytes
+        return; // arrays never have this type
     }
 }
 
@@ -82,7 +82,7 @@ constexpr StoredArray::Element kElementOf<std::int32_t> = StoredArray::Element::
 template <>
 constexpr StoredArray::Element kElementOf<std::int64_t> = StoredArray::Element::int64;
 
-/// Elements that a file has just as they are asked for go straight to where they are wanted.
+/// Elements that a file has in the requested layout are read directly into the destination.
 template <class Number>
 bool readDirectly(const StoredArray& array, std::span<Number> destination) {
     if (array.file == nullptr || array.element != kElementOf<Number> || array.stride != 0 ||
@@ -118,7 +118,7 @@ bool isWhole(const char* token, const char* end) {
     return skipDigits(token + (*token == '-' || *token == '+' ? 1 : 0), end) == end;
 }
 
-/// A token that is no number stands for the code of its first letter, as one-letter codes do everywhere.
+/// A token that is no number means the code of its first letter, as one-letter codes do everywhere.
 double letterCode(char letter) { return static_cast<unsigned char>(letter); }
 
 template <class Number>
@@ -133,7 +133,7 @@ Number parseElement(const char* token, const char* end, bool bitPatterns) {
         }
     }
     if constexpr (std::is_same_v<Number, float> || std::is_same_v<Number, std::uint32_t>) {
-        // Not by way of a double: the nearest float of the nearest double may be the wrong one.
+        // Not through a double: the nearest float of the nearest double may be the wrong one.
         if (const std::optional<float> number = parseFloat(text)) {
             return convertNumber<Number>(*number);
         }
@@ -145,7 +145,7 @@ Number parseElement(const char* token, const char* end, bool bitPatterns) {
     return convertNumber<Number>(parseReal(text).value_or(letterCode(*token)));
 }
 
-/// The common case, a number that std::from_chars takes as it stands, in one pass; everything else token by token.
+/// The common case, a number that std::from_chars accepts, in one pass; everything else token by token.
 template <class Number>
 const char* parseFast(const char* text, const char* end, Number& number) {
     if constexpr (!std::is_same_v<Number, std::uint32_t>) {
@@ -157,7 +157,7 @@ const char* parseFast(const char* text, const char* end, Number& number) {
     return nullptr;
 }
 
-/// Past what stands between two values: in long lists nothing but a comma.
+/// Skips what separates two values: in long lists only a comma.
 inline const char* nextValue(const char* text, const char* end) {
     const bool commaAlone = end - text > 1 && text[0] == ',' && (chars::is(chars::digit, text[1]) || text[1] == '-');
     return commaAlone ? text + 1 : skipSeparators(text, end);

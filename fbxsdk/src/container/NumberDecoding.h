@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Stored arrays become numbers here, at the moment somebody asks for them.
+// Stored arrays are decoded to numbers here, on access.
 #pragma once
 
 #include <cstdint>
@@ -21,11 +21,11 @@ namespace detail {
 /// An array is inflated straight into the destination, and widened or swapped there; only narrowing and partial reads
 /// go through a temporary of the array's size. False when the array is corrupt; the destination is then undefined.
 /// Throws FileFault where the file cannot be read any more, and std::bad_alloc.
-/// std::uint32_t asks for the bits of 32-bit floats.
+/// std::uint32_t requests the bits of 32-bit floats.
 template <class Number>
 [[nodiscard]] bool decodeArray(const StoredArray& array, std::span<Number> destination);
 
-/// The payload is where the array says, read from the file if need be. `memory` keeps it.
+/// The payload is at the array's address, read from the file if necessary. `memory` keeps it.
 [[nodiscard]] std::span<const char> payloadOf(const StoredArray& array, std::unique_ptr<char[]>& memory);
 
 extern template bool decodeArray(const StoredArray&, std::span<double>);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The scan over lists of numbers: nearly all the time that reading an ASCII file takes is spent here.
+// The scan over lists of numbers, which takes nearly all the time of reading an ASCII file.
 #include "container/NumberRun.h"
 
 #include <string_view>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The scan over lists of numbers that ASCII files mostly consist of.
+// The scan over lists of numbers, of which ASCII files mostly consist.
 #pragma once
 
 #include <cstdint>
@@ -20,7 +20,7 @@ struct NumberRun {
 };
 
 /// Counts the numbers of a run and checks the spelling of each, so that decoding them later cannot fail. The run ends
-/// where no number follows, or the name of the next record. Where words count, any word passes for a number.
+/// where no number follows, or the name of the next record. Where words count, any word is accepted as a number.
 [[nodiscard]] NumberRun scanNumbers(const char* text, const char* end, bool wordsCount);
 
 } // namespace detail

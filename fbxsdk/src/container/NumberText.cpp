@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Numbers and blanks as ASCII files spell them. std::from_chars does the arithmetic; what it does not know are a
-// leading plus sign, old runtimes' spellings of infinity, and what a number out of range should become.
+// Numbers and blanks as ASCII files spell them. std::from_chars does the arithmetic; it does not handle
+// leading plus signs, old runtimes' spellings of infinity, and numbers out of range.
 #include "container/NumberText.h"
 
 #include <algorithm>
@@ -73,8 +73,8 @@ std::optional<double> parseHashForm(std::string_view text) {
     return std::nullopt;
 }
 
-/// What a plain number is that no floating-point type can hold: beyond all or next to nothing. The power of ten of its
-/// first digit that is not zero decides, and out of range that is far from zero.
+/// The value of a plain number that no floating-point type can represent: infinite or zero. The power of ten of its
+/// first non-zero digit decides, and out of range that is far from zero.
 template <class Real>
 Real outOfRange(std::string_view number) {
     const bool negative = number.front() == '-';

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Numbers and blanks as ASCII files spell them. The functions that walk megabytes of numbers are inline.
+// Numbers and blanks as ASCII files spell them. The functions that scan megabytes of numbers are inline.
 #pragma once
 
 #include <array>
@@ -51,19 +51,19 @@ inline constexpr auto kKinds = [] {
     return text;
 }
 
-/// The end of a comment: a line feed, or a carriage return in files of systems that had it alone.
+/// The end of a comment: a line feed, or a carriage return in files of systems that use it for line ends.
 [[nodiscard]] const char* commentEnd(const char* text, const char* end);
 
-/// Past comments, and blanks behind each.
+/// Skips comments, and blanks after each.
 [[nodiscard]] const char* skipComments(const char* text, const char* end);
-/// Past blanks and comments.
+/// Skips blanks and comments.
 [[nodiscard]] inline const char* skipBlanks(const char* text, const char* end) {
     while (text != end && chars::is(chars::blank, *text)) {
         ++text;
     }
     return text == end || *text != ';' ? text : skipComments(text, end);
 }
-/// Past blanks, comments and commas: what stands between two values. A comma too many means nothing.
+/// Skips blanks, comments and commas: what separates two values. Surplus commas are ignored.
 [[nodiscard]] inline const char* skipSeparators(const char* text, const char* end) {
     text = skipBlanks(text, end);
     while (text != end && *text == ',') {
@@ -83,7 +83,7 @@ inline constexpr auto kKinds = [] {
     return std::countr_zero(others) / 8;
 }
 
-/// Eight at a time where the text allows: digits are most of what a file of meshes consists of.
+/// Eight at a time where the text allows: meshes in ASCII consist mostly of digits.
 [[nodiscard]] inline const char* skipDigits(const char* text, const char* end) {
     while (end - text >= 8) {
         const int count = digitsOfEight(text);
@@ -136,7 +136,7 @@ inline constexpr auto kKinds = [] {
 /// infinite, too small ones zero, as in strtod.
 [[nodiscard]] std::optional<double> parseReal(std::string_view token);
 [[nodiscard]] std::optional<float> parseFloat(std::string_view token);
-/// A token that is nothing but a sign and digits and fits; null otherwise, and for "-0", which only a real can hold.
+/// A token that is only a sign and digits and fits; null otherwise, and for "-0", which only a floating-point type has.
 [[nodiscard]] std::optional<std::int64_t> parseInteger(std::string_view token);
 
 } // namespace detail

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Safe saving: written beside, flushed, renamed.
+// Safe saving: written next to the target, flushed, renamed.
 #include "container/OutputFile.h"
 
 #include <algorithm>
@@ -22,12 +22,12 @@ namespace {
 constexpr std::size_t kBufferBytes = std::size_t{1} << 18;
 /// Names that are tried for a file of our own before giving up.
 constexpr int kMostNames = 1000;
-/// Behind the last name that was given, so that thousands of files beside each other do not try each other's names.
+/// Follows the last name that was used, so that thousands of files next to each other do not try each other's names.
 std::atomic<unsigned> nextName{0};
 /// Links that are followed, as many as the system follows.
 constexpr int kMostLinks = 40;
 
-/// The file that a name means. The last of its links may lead to nothing yet.
+/// The file that a name refers to. The last of its links may be dangling.
 std::string behindLinks(const std::string& name, int& error) {
     namespace fs = std::filesystem;
     std::error_code failure;
@@ -48,7 +48,7 @@ std::string folderOf(const std::string& path) {
     return slash == std::string::npos ? "./" : path.substr(0, slash + 1);
 }
 
-/// Tries names in the folder until `make` gives another error than that the name is taken. `path` is the last one.
+/// Tries names in the folder until `make` returns another error than that the name exists. `path` is the last one.
 template <class Make>
 int tryNames(const std::string& folder, std::string& path, const Make& make) {
     // Not derived from the target's name, which may be as long as a name can be.
@@ -63,10 +63,10 @@ int tryNames(const std::string& folder, std::string& path, const Make& make) {
     return EEXIST;
 }
 
-/// What gets bytes, but cannot be replaced.
+/// A target that can be written but not replaced.
 bool isStream(const struct stat& file) { return !S_ISREG(file.st_mode) && !S_ISDIR(file.st_mode); }
 
-/// Whether the file system, or its rules, just do not let a file have two names.
+/// Whether the file system, or its rules, does not allow hard links.
 bool isWithoutLinks(int error) { return error == EPERM || error == ENOTSUP || error == ENOSYS || error == EMLINK; }
 
 } // namespace
@@ -103,7 +103,7 @@ bool OutputFile::open(FbxStatus& status) {
         return fail(ENOENT, status);
     }
     struct stat existing {};
-    // Before links are followed: that of a standard stream leads to the name of no file.
+    // Before links are followed: that of a standard stream does not lead to the name of a file.
     if (::stat(mName.c_str(), &existing) == 0 && isStream(existing)) {
         return openStream(status);
     }
@@ -151,7 +151,7 @@ int OutputFile::openSpool() {
     std::string path;
     const int error = tryNames(folder, path, [&] { return mOperations.create(path, kOnlyForUs, mFile); });
     if (error == 0) {
-        mOperations.remove(path); // the file itself lives until it is closed
+        mOperations.remove(path); // the file itself exists until it is closed
     }
     return error;
 }
@@ -210,7 +210,7 @@ void OutputFile::extend(std::uint64_t newSize) {
         mBuffer.append(static_cast<std::size_t>(gap), '\0');
         return;
     }
-    // What lies between the end and a byte behind it is zero, and takes no place where the file system can spare it.
+    // The gap between the end and a later byte is zero, and takes no space where the file system supports it.
     flushBuffer();
     mWritten = newSize - 1;
     mBuffer.push_back('\0');
@@ -225,7 +225,7 @@ bool OutputFile::commitTogether(std::span<OutputFile* const> files, FbxStatus& s
     const auto all = [&](std::span<OutputFile* const> some, bool (OutputFile::*step)(FbxStatus&)) {
         return std::all_of(some.begin(), some.end(), [&](OutputFile* file) { return (file->*step)(status); });
     };
-    // Behind the last there is nothing that could fail and make its old file necessary.
+    // After the last rename nothing can fail and make its old file necessary.
     const bool done = all(files, &OutputFile::complete) && all(files.first(files.size() - 1), &OutputFile::keepOld) &&
                       all(files, &OutputFile::takeName);
     for (OutputFile* file : files) {
@@ -331,7 +331,7 @@ void OutputFile::discard() {
 
 void OutputFile::putBack() {
     if (mTookName && !mOld.empty()) {
-        // Where another file of the same name has put it back already, both names stay.
+        // Where another file of the same name has been restored already, both names stay.
         if (mOperations.rename(mOld, mTarget) == 0) {
             mOperations.remove(mOld);
         }

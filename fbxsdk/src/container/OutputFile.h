@@ -15,12 +15,12 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// The bytes go to a file of another name in the same folder, which takes the name over in commit(). Until then, and
-/// after any fault, what stood there before is as it was. Without commit() nothing is left behind.
+/// The bytes go to a file of another name in the same folder, which is renamed in commit(). Until then, and
+/// after any fault, the previous file is unchanged. Without commit() nothing is left behind.
 ///
-/// A link is followed: the file that it leads to is replaced. A pipe or a device cannot be replaced; it gets the bytes
-/// in commit(), all at once, and a pipe that nobody reads is given up soon. Never more than a small part of the bytes
-/// is in memory.
+/// A symbolic link is followed: its target is replaced. A pipe or a device cannot be replaced; it gets the bytes
+/// in commit(), all at once, and a pipe without a reader fails after a short time. Never more than a small part of the
+/// bytes is in memory.
 class OutputFile final : public ByteOutput {
 public:
     /// The operations must outlive the file.
@@ -36,7 +36,7 @@ public:
     void extend(std::uint64_t size);
     [[nodiscard]] std::uint64_t size() const override { return mWritten + mBuffer.size(); }
     [[nodiscard]] bool failed() const override { return mError != 0; }
-    /// Says in the status which file failed, and why.
+    /// Sets the status: which file failed, and why.
     void report(FbxStatus& status) const;
     /// Why it failed, without its name.
     [[nodiscard]] std::string reason() const;
@@ -44,12 +44,12 @@ public:
     /// Puts all bytes on the medium, still under the other name. False when that or any write before it failed; the
     /// status says why. Nothing can be written afterwards.
     [[nodiscard]] bool complete(FbxStatus& status);
-    /// Completes the file and gives it its name.
+    /// Completes the file and renames it.
     [[nodiscard]] bool commit(FbxStatus& status);
-    /// Completes files that belong together, which appear in this order: all of them, or none and what stood there
-    /// before is there again. On a file system without hard links only the last of them can fail without a trace.
-    /// Between the first name and the last nothing happens but that names change. Who is killed just then leaves some
-    /// files new and some old, each of them complete, and the old ones under second names beside them.
+    /// Completes files that belong together, which appear in this order: all of them, or none and the previous
+    /// files are restored. On a file system without hard links only the last of them can fail without a trace.
+    /// Between the first and the last rename there are only renames. A process that is killed then leaves some
+    /// files new and some old, each of them complete, and the old ones under second names next to them.
     [[nodiscard]] static bool commitTogether(std::span<OutputFile* const> files, FbxStatus& status);
 
 private:
@@ -71,15 +71,15 @@ private:
 
     FileOperations& mOperations;
     std::string mName;      ///< as given, for messages
-    std::string mTarget;    ///< behind all links
+    std::string mTarget;    ///< after all links are followed
     std::string mFolder;    ///< of the target
     std::string mTemporary; ///< empty when there is none
-    std::string mOld;       ///< the second name of what stood there before; empty when there is none
+    std::string mOld;       ///< the second name of the previous file; empty when there is none
     bool mDirect = false;   ///< a pipe or a device
     bool mComplete = false;
     bool mTookName = false;
-    bool mStoodAlone = false; ///< nothing stood there before
-    int mFile = -1;           ///< for a pipe or device that gets much: a nameless file until the end
+    bool mStoodAlone = false; ///< there was no previous file
+    int mFile = -1;           ///< for large output to a pipe or device: an unnamed file until the end
     int mError = 0;
     std::string mBuffer;
     std::uint64_t mWritten = 0; ///< bytes before those in the buffer

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Pages from the system and back.
+// Allocation and release of pages.
 #include "container/PageMemory.h"
 
 #include <algorithm>
@@ -31,7 +31,7 @@ void releasePages(std::span<const char> bytes) {
     const std::uintptr_t first = (address + kPageSize - 1) / kPageSize * kPageSize;
     const std::uintptr_t end = (address + bytes.size()) / kPageSize * kPageSize;
     if (first < end) {
-        // The interface knows no constant memory. A refusal leaves the pages where they are.
+        // The interface takes no constant memory. If the call is refused the pages stay.
         ::madvise(const_cast<char*>(bytes.data() + (first - address)), end - first, MADV_DONTNEED);
     }
 }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Memory that goes back to the system page by page, before its owner is done with all of it.
+// Memory that is released page by page, before its owner is done with all of it.
 #pragma once
 
 #include <span>
@@ -11,25 +11,25 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Gives back the pages of a mapping that lie wholly within the bytes. Read again, they come from the file that is
+/// Releases the pages of a mapping that lie wholly within the bytes. Read again, they come from the file that is
 /// mapped there, or as zeros where there is none.
 void releasePages(std::span<const char> bytes);
 
-/// Memory that will soon be filled as a whole takes large pages, where the system has some: most of the time of small
-/// ones goes into getting them one by one.
+/// Uses large pages for memory that will soon be filled completely, where the system has some: most of the time of
+/// small ones is spent getting them one by one.
 void preferLargePages(std::span<char> bytes);
 
-// Under the address sanitizer whoever looks at bytes that are not there yet is caught; elsewhere these do nothing.
+// The address sanitizer reports accesses to bytes that are not read yet; without it these do nothing.
 
-/// Bytes that nobody may look at until they are said to be there.
+/// Marks bytes that must not be accessed yet.
 void forbid(std::span<const char> bytes);
-/// Bytes that are there.
+/// Marks bytes that may be accessed.
 void allow(std::span<const char> bytes);
 
-/// Zeroed memory of its own pages.
+/// Zeroed memory in pages of its own.
 class PageMemory {
 public:
-    /// Throws std::bad_alloc when there is not as much.
+    /// Throws std::bad_alloc when the system has not enough.
     explicit PageMemory(std::size_t size);
     PageMemory(const PageMemory&) = delete;
     PageMemory& operator=(const PageMemory&) = delete;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The way into the container layer: which container a file is, its content decides, never its name.
+// The entry to the container layer: the container of a file is detected by its content, never by its name.
 #include <algorithm>
 #include <new>
 #include <utility>
@@ -17,7 +17,7 @@ namespace detail {
 
 namespace {
 
-/// Looks at no more of the file than it takes to know.
+/// Reads no more of the file than the detection needs.
 bool startsAsAscii(std::span<const char> bytes, ReadAhead& ahead) {
     constexpr std::size_t kFirstLook = std::size_t{1} << 12;
     for (std::size_t size = kFirstLook;; size *= 2) {

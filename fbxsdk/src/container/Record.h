@@ -1,9 +1,9 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The record tree that both containers, binary and ASCII, are cut into. After this stage nobody knows which one a file
-// was. Records and values point into the bytes of the file (or into the tree's own text store), so a tree lives exactly
-// as long as its RecordTree.
+// The record tree that both containers, binary and ASCII, are parsed into. Later stages are independent of the
+// container. Records and values point into the bytes of the file (or into the tree's own arena of texts), so a tree is
+// valid exactly as long as its RecordTree.
 #pragma once
 
 #include <cstddef>
@@ -26,19 +26,19 @@ namespace detail {
 
 class FileBytes;
 
-/// A numeric array as the file stores it; decoded by readNumbers only when somebody asks.
+/// A numeric array as the file stores it; decoded by readNumbers on access.
 struct StoredArray {
     /// int8 holds booleans and bytes and counts from 0 to 255.
     enum class Element : std::uint8_t { int8, int32, int64, float32, float64, text };
     Element element = Element::float64;
     bool compressed = false;  ///< one zlib stream of the raw elements
     bool bigEndian = false;   ///< byte order of the raw elements
-    bool bitPatterns = false; ///< ASCII: whole numbers that stand for the bits of 32-bit floats
+    bool bitPatterns = false; ///< ASCII: whole numbers that are the bits of 32-bit floats
     std::uint8_t stride = 0;  ///< bytes from one element to the next; 0 when they are packed
     std::uint64_t count =
         0; ///< elements; already checked against the bytes (deflate cannot expand further than 1032:1)
     std::span<const char> bytes;     ///< the payload in the file; for `text` the source text of the list
-    const FileBytes* file = nullptr; ///< where the payload has to be read from first; null when it is there
+    const FileBytes* file = nullptr; ///< where the payload must be read from; null when it is in memory
 };
 
 /// One value of a record. Whole numbers and reals convert into each other; text never converts into a number.
@@ -142,9 +142,9 @@ struct Record {
 
     /// The record's array; null when it has none.
     [[nodiscard]] const StoredArray* array() const;
-    /// How many numbers the record carries: the elements of its array, or its numeric scalars.
+    /// The number of the record's numbers: the elements of its array, or its numeric scalars.
     [[nodiscard]] std::size_t numberCount() const;
-    /// Decodes the first destination.size() numbers straight into the destination, converting where the stored type
+    /// Decodes the first destination.size() numbers directly into the destination, converting where the stored type
     /// differs (reals to whole numbers by truncation with saturation). False when a compressed array is corrupt or the
     /// record has fewer numbers; the destination is then zero-filled. Throws FileFault when the file was changed
     /// meanwhile and std::bad_alloc.
@@ -157,7 +157,7 @@ struct Record {
     [[nodiscard]] bool readFloatBits(std::span<std::uint32_t> destination) const;
 };
 
-/// The bytes of a file and the records cut from it.
+/// The bytes of a file and the records parsed from it.
 class RecordTree {
 public:
     RecordTree() = default;
@@ -177,7 +177,7 @@ public:
     /// "line" or "offset" and the number, for messages about a record.
     [[nodiscard]] std::string placeOf(const Record& record) const;
 
-    // What readers (and the translation of old generations) build records with. Memory is released with the tree.
+    // For building records, by readers and by the translation of old generations. Memory is released with the tree.
     Record& newRecord(std::string_view name) {
         auto* const record = new (allocate<Record>(1)) Record;
         record->name = name;
@@ -191,7 +191,7 @@ public:
     StoredArray& newArray() { return *new (allocate<StoredArray>(1)) StoredArray; }
     std::string_view keepText(std::string text);
 
-    std::shared_ptr<const void> mapping;   ///< keeps the bytes alive
+    std::shared_ptr<const void> mapping;   ///< keeps the bytes valid
     std::shared_ptr<const FileBytes> file; ///< the bytes, when they are those of a file
 
 private:
@@ -216,7 +216,7 @@ private:
     std::deque<std::string> mTexts;
 };
 
-/// Reads a file into a tree: detects the container by content and cuts it into records. Large arrays are not read yet.
+/// Reads a file into a tree: detects the container by content and parses it into records. Large arrays are read later.
 ///
 /// Null on failure; the status then says which file, where in it and what is wrong. Arrays are not decoded here.
 [[nodiscard]] std::unique_ptr<RecordTree> readRecords(const std::string& fileName, FbxStatus& status);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Records for the world outside: handles to the tree, values by value.
+// The public interface to records: handles to the tree, values by value.
 #include <fbxsdk/extensions/RecordFile.h>
 
 #include <utility>

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Where writers put records. A writer says what a record holds; the sink knows how a container spells it. Both sinks,
-// binary and ASCII, write the same tree, so that after reading nobody knows which one it was.
+// The output of writers. A writer states what a record holds; the sink encodes it for a container. Both sinks,
+// binary and ASCII, write the same tree, so that a reader does not depend on which one it was.
 #pragma once
 
 #include <cstdint>
@@ -19,7 +19,7 @@ namespace detail {
 ///
 ///     sink.beginRecord("Layer"); sink.integer(0); sink.beginBlock(); …records…; sink.endRecord();
 ///
-/// Nothing is reported on the way: the first fault is kept, what follows it is ignored, and finish() says how it went.
+/// Nothing is reported in between: the first fault is kept, what follows it is ignored, and finish() returns it.
 class RecordSink {
 public:
     RecordSink() = default;
@@ -30,7 +30,7 @@ public:
     [[nodiscard]] virtual bool isBinary() const = 0;
 
     virtual void beginRecord(std::string_view name) = 0;
-    /// Opens the record's block; it stays even when nothing is put into it. At most once per record.
+    /// Opens the record's block; it is written even when nothing is put into it. At most once per record.
     virtual void beginBlock() = 0;
     virtual void endRecord() = 0;
 
@@ -43,9 +43,9 @@ public:
     /// A one-letter code, as in `Shading: T`.
     virtual void letter(char value) = 0;
     virtual void text(std::string_view value) = 0;
-    /// Bytes that are no text.
+    /// Bytes that are not text.
     virtual void raw(std::span<const char> bytes) = 0;
-    /// The name of an object together with the class that stands before it: `Model::cube`.
+    /// The name of an object together with the class before it: `Model::cube`.
     virtual void objectName(std::string_view className, std::string_view name) = 0;
 
     virtual void array(std::span<const double> values) = 0;
@@ -54,13 +54,13 @@ public:
     virtual void array(std::span<const std::int64_t> values) = 0;
     /// Booleans; each element is 0 or 1.
     virtual void array(std::span<const std::uint8_t> values) = 0;
-    /// 32-bit words that files keep as the bits of floats: the packed data of keys.
+    /// 32-bit words that files store as the bits of floats: the packed data of keys.
     virtual void floatBits(std::span<const std::uint32_t> words) = 0;
 
     /// Writes whole records, one after the other.
     using Part = std::function<void(RecordSink& sink)>;
     /// Parts in this order. A sink may have several of them written at the same time: they must not change anything
-    /// that they share, nor use any other sink than the one that they get.
+    /// that they share, nor use any other sink than the one that they are passed.
     virtual void parts(std::span<const Part> list) {
         for (const Part& part : list)
             part(*this);
@@ -69,7 +69,7 @@ public:
     /// A heading between top-level records, for human readers.
     virtual void heading(std::string_view) {}
 
-    /// Whether something went wrong already. Long loops ask, to stop early.
+    /// Whether a fault has occurred. Long loops check it, to stop early.
     [[nodiscard]] virtual bool failed() const = 0;
 };
 

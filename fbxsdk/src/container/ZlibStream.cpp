@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The only place that knows the compression library.
+// The only source that uses the compression library.
 #include "container/ZlibStream.h"
 
 #include <algorithm>
@@ -22,15 +22,15 @@ namespace {
 /// Geometry is mostly mantissa bits: level 3 takes almost twice as long and saves a fiftieth of the bytes.
 constexpr int kCompressionLevel = 1;
 
-/// Longer arrays do not repeat.
+/// Longer arrays hardly repeat and are not cached.
 constexpr std::size_t kMostKeptBytes = std::size_t{1} << 18;
 
 } // namespace
 
 namespace {
 
-/// What a thread inflates with. Curves of one rig have their keys at the same times, and an array of them each: short
-/// arrays that were inflated lately are copied.
+/// A thread's decompressor and cache. Curves of one rig have their keys at the same times, each with an array of its
+/// own: short arrays that were inflated recently are copied.
 class Inflater {
 public:
     bool inflate(std::span<const char> stream, std::span<char> destination) {
@@ -54,13 +54,13 @@ private:
     static constexpr std::size_t kMostRemembered = std::size_t{1} << 13;
 
     struct Kept {
-        std::vector<char> bytes;    ///< of the stream, and behind it what it holds
-        std::size_t streamSize = 0; ///< of it
-        std::size_t size = 0;       ///< of what it holds; 0: nothing is kept here
+        std::vector<char> bytes;    ///< the stream, followed by its inflated content
+        std::size_t streamSize = 0; ///< size of the stream
+        std::size_t size = 0;       ///< size of the content; 0: the entry is unused
         std::uint64_t lastUse = 0;
     };
 
-    /// The place of that stream; else the one that was not used for longest, emptied.
+    /// The entry of that stream; else the least recently used one, emptied.
     Kept& find(std::span<const char> stream, std::size_t size) {
         Kept* oldest = mKept.data();
         for (Kept& kept : mKept) {
@@ -88,9 +88,9 @@ private:
             mDecompressor.reset(libdeflate_alloc_decompressor());
         }
         if (!mDecompressor) {
-            throw std::bad_alloc(); // says nothing about the stream
+            throw std::bad_alloc(); // not an error of the stream
         }
-        // Without a place for the actual size the library insists on the exact one.
+        // Without a variable for the actual size the library requires the exact one.
         return libdeflate_zlib_decompress(mDecompressor.get(), stream.data(), stream.size(), destination.data(),
                                           destination.size(), nullptr) == LIBDEFLATE_SUCCESS;
     }
@@ -126,7 +126,7 @@ std::span<const char> Deflater::deflated(std::span<const char> bytes) {
     const std::span<const char> stream = deflatedAnew(bytes);
     Kept& kept = mKept[mOldest];
     mOldest = (mOldest + 1) % mKept.size();
-    kept.bytes.clear(); // until the stream is complete, nothing is found
+    kept.bytes.clear(); // until the stream is complete, it is not found
     kept.stream.assign(stream.begin(), stream.end());
     kept.bytes.assign(bytes.begin(), bytes.end());
     return kept.stream;

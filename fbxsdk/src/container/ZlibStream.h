@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The only place that knows the compression library.
+// The interface to the compression library.
 #pragma once
 
 #include <array>
@@ -25,7 +25,7 @@ inline constexpr std::uint64_t kMaxDeflateRatio = 1032;
 [[nodiscard]] bool inflateExactly(std::span<const char> stream, std::span<char> destination);
 
 /// Deflates one array after the other into zlib streams. Animation repeats itself, most of all the times of its keys:
-/// what was deflated a moment ago is not deflated again.
+/// an array that was deflated recently is not deflated again.
 class Deflater {
 public:
     Deflater();
@@ -46,10 +46,10 @@ private:
 
     struct Compressor;
     std::unique_ptr<Compressor> mCompressor;
-    std::unique_ptr<char[]> mMemory; ///< of the last stream; nobody clears it
+    std::unique_ptr<char[]> mMemory; ///< of the last stream; reused, never cleared
     std::size_t mMemorySize = 0;
     std::array<Kept, 8> mKept;
-    std::size_t mOldest = 0; ///< of those that are kept
+    std::size_t mOldest = 0; ///< of the cached ones
 };
 
 } // namespace detail

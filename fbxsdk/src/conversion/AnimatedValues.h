@@ -13,7 +13,7 @@ FBXSDK_NAMESPACE_BEGIN
 class FbxAnimLayer;
 namespace detail {
 
-/// Component i of the result is sign[i] times component source[i] of what was there.
+/// Component i of the result is sign[i] times component source[i] of the old value.
 struct SignedPermutation {
     std::array<int, 3> source{0, 1, 2};
     std::array<double, 3> sign{1, 1, 1};
@@ -26,7 +26,7 @@ struct SignedPermutation {
 void scaleAnimated(FbxProperty property, double factor, const std::function<bool(const FbxAnimLayer*)>& applies);
 void scaleAnimated(FbxProperty property, double factor);
 
-/// Exchanges the components of a vector property, and of its curve nodes on every layer.
+/// Permutes the components of a vector property, and of its curve nodes on every layer.
 void permuteAnimated(FbxProperty property, const SignedPermutation& permutation);
 
 } // namespace detail

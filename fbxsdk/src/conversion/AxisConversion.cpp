@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Converting a scene from one axis system to another: the nodes below the root are turned, so that every global matrix
-// is the old one seen from the new system. The turn enters as pre-rotation, so rotation curves stay as they are.
+// Converting a scene from one axis system to another: the nodes below the root are rotated, so that every global matrix
+// is the old one expressed in the new system. The rotation is added to the pre-rotation, so rotation curves stay.
 #include <array>
 #include <cmath>
 #include <string>
@@ -37,7 +37,7 @@ SignedAxis upAxis(const FbxAxisSystem& system) {
 SignedAxis frontAxis(const FbxAxisSystem& system) {
     int sign = 1;
     const bool even = system.GetFrontVector(sign) == FbxAxisSystem::eParityEven;
-    // Of the two axes beside the up axis, in the order X, Y, Z, even is the first and odd the second.
+    // Of the two axes other than the up axis, in the order X, Y, Z, even is the first and odd the second.
     constexpr std::array<std::array<int, 2>, 3> kOthers = {{{1, 2}, {0, 2}, {0, 1}}};
     const auto& others = kOthers[static_cast<std::size_t>(upAxis(system).index)];
     return {even ? others[0] : others[1], sign};
@@ -86,7 +86,7 @@ FbxAMatrix matrixOf(const SignedPermutation& turn) {
     return matrix;
 }
 
-/// Pre-rotation M Rpre. Where rotation was not active, what was not in force is cleared before it comes into force.
+/// Pre-rotation M Rpre. Where rotation was not active, settings without effect are cleared before it is activated.
 void turnRotation(FbxNode& node, const FbxAMatrix& turn) {
     constexpr auto kSet = FbxNode::eSourcePivot;
     FbxAMatrix before;
@@ -101,7 +101,7 @@ void turnRotation(FbxNode& node, const FbxAMatrix& turn) {
     node.SetRotationActive(true);
 }
 
-/// One bound of the translation: its value, and for each component whether it holds.
+/// One bound of the translation: its value, and for each component whether it is active.
 struct Bound {
     FbxDouble3 value;
     std::array<bool, 3> holds{};
@@ -121,7 +121,7 @@ void writeBound(FbxNode& node, const std::string& name, const Bound& bound) {
         node.FindProperty((name + kComponentNames[i]).c_str()).Set(bool{bound.holds[i]});
 }
 
-/// The limits turn with the translation; where a component changes its sign, the lower one becomes the upper one.
+/// The limits are rotated with the translation; where a component changes its sign, lower and upper are exchanged.
 void turnTranslationLimits(FbxNode& node, const SignedPermutation& turn) {
     const std::array<Bound, 2> old = {readBound(node, "TranslationMin"), readBound(node, "TranslationMax")};
     std::array<Bound, 2> turned;

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Converting a scene from one unit to another: the nodes below the root are scaled, so that every global matrix is the
-// old one times the factor, and what is measured in scene units but not moved by a node follows.
+// old one times the factor, and quantities in scene units that do not follow a node are scaled as well.
 #include <cmath>
 #include <initializer_list>
 #include <vector>
@@ -30,7 +30,7 @@ FbxVector4 multiplied(const FbxVector4& vector, double factor) {
     return {vector[0] * factor, vector[1] * factor, vector[2] * factor, 1.0};
 }
 
-/// Of layers that multiply scales only the base carries the unit's factor: every further one would apply it again.
+/// Of layers that multiply scales only the base gets the unit's factor: every further one would apply it again.
 bool carriesFactor(const FbxAnimLayer* layer) {
     if (!layer)
         return true;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The affine matrix: composed from and taken apart into translation, rotation and scale by core/Rotation.h.
+// The affine matrix: composed from translation, rotation and scale, and decomposed, by core/Rotation.h.
 #include <fbxsdk/FbxAMatrix.h>
 
 #include <algorithm>
@@ -16,7 +16,7 @@ namespace {
 
 using detail::Axes;
 
-/// A determinant of rows of size 1 that is no larger is rounding noise of a singular matrix.
+/// Rows are normalised to size 1: a determinant no larger than this is rounding noise of a singular matrix.
 constexpr double kSingularDeterminant = 16.0 * DBL_EPSILON;
 
 /// Writes axes times scale into the upper left 3×3 part.

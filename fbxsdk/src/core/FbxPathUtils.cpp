@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Paths are cut into a root and components, changed, and joined again; the text functions never ask the file system.
+// Paths are split into a root and components, changed, and joined again; the text functions never access files.
 #include <fbxsdk/FbxPathUtils.h>
 
 #include <algorithm>
@@ -15,7 +15,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-/// A path in pieces.
+/// A path split into its parts.
 struct Path {
     std::string root;                    ///< "/", "C:/", "//server", or empty for a relative path
     std::vector<std::string> components; ///< none of them empty
@@ -31,7 +31,7 @@ std::string withForwardSlashes(const char* text) {
 
 bool isLetter(char c) { return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z'); }
 
-/// How many bytes of a path with forward slashes are its root. "C:" without separator counts only when it is all.
+/// The length of the root of a path with forward slashes in bytes. "C:" without separator is a root only by itself.
 size_t rootLength(std::string_view path) {
     if (path.size() >= 2 && isLetter(path[0]) && path[1] == ':') {
         return path.size() == 2 ? 2 : path[2] == '/' ? 3 : 0;
@@ -45,7 +45,7 @@ size_t rootLength(std::string_view path) {
 
 bool isAbsolute(std::string_view path) { return rootLength(path) != 0; }
 
-/// Cuts a path, and leaves out what does nothing: empty components, ".", and ".." with the component before it.
+/// Splits a path, and drops redundant components: empty ones, ".", and ".." with the component before it.
 Path parse(const std::string& text) {
     Path path;
     const size_t rootEnd = rootLength(text);
@@ -133,7 +133,7 @@ size_t nameBegin(const std::string& path) {
     return std::max(rootLength(path), separator == std::string::npos ? 0 : separator + 1);
 }
 
-/// Where the extension's dot stands, or the end of the path.
+/// Position of the extension's dot, or of the end of the path.
 size_t dotOf(const std::string& path) {
     const size_t dot = path.rfind('.');
     return dot == std::string::npos || dot < nameBegin(path) ? path.size() : dot;
@@ -188,7 +188,7 @@ bool FbxPathUtils::Exist(const char* pFolderPathUTF8) {
 bool FbxPathUtils::Create(const char* pFolderPathUTF8) {
     std::error_code error;
     fs::create_directories(toSystemPath(clean(withForwardSlashes(pFolderPathUTF8))), error);
-    return Exist(pFolderPathUTF8); // whoever created it, and whatever a system says about one that was there already
+    return Exist(pFolderPathUTF8); // also when it existed, or another process has created it
 }
 
 bool FbxPathUtils::Delete(const char* pFolderPathUTF8) {

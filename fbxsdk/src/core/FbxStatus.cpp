@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Outcomes: one table holds the general sentence of each code.
+// Outcomes: one table has the default message of each code.
 #include <fbxsdk/FbxStatus.h>
 
 #include <cstdarg>
@@ -61,7 +61,7 @@ void FbxStatus::SetCode(EStatusCode pCode, const char* pErrorMsg, ...) {
     const int length = std::vsnprintf(nullptr, 0, pErrorMsg, forLength);
     va_end(forLength);
 
-    // built aside: the sentence that is replaced may be one of the arguments
+    // built separately: the message that is replaced may be one of the arguments
     std::string sentence(length > 0 ? static_cast<size_t>(length) : 0, '\0');
     if (length > 0) {
         std::vsnprintf(sentence.data(), sentence.size() + 1, pErrorMsg, arguments);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The owned string. Case is an affair of ASCII letters here, so that no locale has a say.
+// The owned string. Case is that of ASCII letters, independent of the locale.
 #include <fbxsdk/FbxString.h>
 
 #include <algorithm>
@@ -43,7 +43,7 @@ FbxString::FbxString(float pValue) : mText(decimal(pValue)) {}
 FbxString::FbxString(double pValue) : mText(decimal(pValue)) {}
 
 FbxString& FbxString::operator=(const char* pStr) {
-    mText = std::string(orEmpty(pStr)); // by way of a copy: the argument may point into this string
+    mText = std::string(orEmpty(pStr)); // through a copy: the argument may point into this string
     return *this;
 }
 

@@ -52,7 +52,7 @@ constexpr bool inEnumeratorOrder() {
 }
 static_assert(std::size(kTimeModes) == FbxTime::eModesCount && inEnumeratorOrder());
 
-/// What a scene without a usable rate of its own runs at.
+/// The rate of a scene without a usable rate of its own.
 constexpr FbxTime::EMode kFallbackMode = FbxTime::eFrames30;
 constexpr double kFallbackRate = kTimeModes[kFallbackMode].rate;
 
@@ -75,7 +75,7 @@ GlobalTimeMode& globalTimeMode() {
 
 bool isUsableRate(double rate) { return rate > 0.0 && std::isfinite(rate); }
 
-/// Saturating, away from the undefined: every long double becomes a tick count, NaN becomes 0.
+/// Saturating and always defined: every long double becomes a tick count, NaN becomes 0.
 FbxLongLong saturated(long double ticks) {
     if (std::isnan(ticks)) {
         return 0;
@@ -106,9 +106,9 @@ FbxLongLong rounded(long double ticks) {
 
 Wide wide(FbxLongLong ticks) { return ticks; }
 
-/// The ticks of so many seconds, 0 of NaN. The product of the seconds' mantissa with the ticks of a second is exact, so
-/// that nothing is rounded but the last: to the nearest tick, halves away from zero. A time is set for every sample,
-/// and long double takes many times as long.
+/// The ticks of a number of seconds, 0 for NaN. The product of the seconds' mantissa with the ticks of a second is
+/// exact, so that only the last step rounds: to the nearest tick, halves away from zero. A time is set for every
+/// sample, and long double is several times slower.
 FbxLongLong ticksOfSeconds(double seconds) {
     constexpr double kTooMany = 268435456.0; // 2^28, which is more ticks than there are
     if (!(std::abs(seconds) < kTooMany)) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What FbxAMatrix and FbxMatrix share: element-wise work on the sixteen doubles.
+// The common part of FbxAMatrix and FbxMatrix: element-wise operations on the sixteen doubles.
 #pragma once
 
 #include <cmath>

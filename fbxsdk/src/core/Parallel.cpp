@@ -25,7 +25,7 @@ int threadsOfMachine() { return static_cast<int>(std::max(1U, std::thread::hardw
 
 int meantBy(int count) { return count == 0 ? threadsOfMachine() : std::max(count, 1); }
 
-/// What the environment says; 1 when it says nothing, or no number.
+/// The number in the environment; 1 without a valid one.
 int initialMaximum() {
     const char* const text = std::getenv("TARNELL_FBX_THREADS");
     const std::string_view digits(text ? text : "");
@@ -42,7 +42,7 @@ std::atomic<int>& maximum() {
 /// Threads that were started and have not ended yet, of all calls.
 std::atomic<int> helpersAtWork{0};
 
-/// Leave to start some threads, for as long as it lives; fewer than asked for, or none, when others are at work.
+/// A reservation of threads, for the lifetime of the object; fewer than requested, or none, when others are in use.
 class HelperLeave {
 public:
     explicit HelperLeave(std::size_t wanted) {
@@ -110,7 +110,7 @@ void forEachInParallel(std::size_t count, const std::function<void(std::size_t)>
             for (int i = 0; i < leave.count(); ++i) {
                 threads.emplace_back([&crew] { crew.run(); });
             }
-        } catch (const std::exception&) { // no thread, or no memory for one: the others will do
+        } catch (const std::exception&) { // no thread, or no memory for one: the others do the work
         }
         crew.run();
     }

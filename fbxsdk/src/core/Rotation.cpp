@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Rotations in their three shapes. The conversions between angles and axes are written once, for a first, a middle and
-// a last axis; orders whose axes are not cyclic (XZY, YXZ, ZYX) are the mirror image, with all angles negated. The
+// Rotations in three representations. The conversions between angles and axes are written once, for a first, a middle
+// and a last axis; orders whose axes are not cyclic (XZY, YXZ, ZYX) are the mirror image, with all angles negated. The
 // extraction follows Shoemake, "Euler angle conversion", Graphics Gems IV.
 #include "core/Rotation.h"
 
@@ -46,10 +46,10 @@ const OrderRow& rowOf(EFbxRotationOrder order) {
     return index < std::size(kOrders) ? kOrders[index] : kOrders[0];
 }
 
-/// Below this cosine of the middle angle the first and the last axis coincide for all practical purposes.
+/// Below this cosine of the middle angle the first and the last axis are treated as parallel.
 constexpr double kGimbalThreshold = 16.0 * FLT_EPSILON;
 
-/// A length of less is as good as none: dividing by it would leave the range of doubles.
+/// A smaller length is treated as zero: dividing by it would leave the range of doubles.
 constexpr double kSmallestLength = DBL_MIN;
 
 /// Two unit axes whose cross product is shorter are parallel.
@@ -94,7 +94,7 @@ void completeAxes(Axes& axes, std::array<bool, 3> missing) {
                 axes[i] = divided(normal, length(normal));
                 return;
             }
-            missing[k] = true; // parallel: one of the two says nothing
+            missing[k] = true; // parallel: one of the two is redundant
         }
     }
     for (size_t i = 0; i < 3; ++i) {
@@ -118,13 +118,13 @@ struct RightAngles {
 };
 
 RightAngles rightAnglesIn(double degrees) {
-    constexpr double kMost = 1.0e9; // further out the product of a count is not exact, or the count no int
+    constexpr double kMost = 1.0e9; // further out the product is not exact, or the count does not fit an int
     if (!(std::abs(degrees) < kMost)) {
         int count = 0;
         const double rest = std::remquo(degrees, 90.0, &count);
         return {count, rest};
     }
-    // Adding and taking away what leaves no room for fractions rounds to the nearest whole number, halves to even ones.
+    // Adding and subtracting a number too large for fractions rounds to the nearest whole number, halves to even ones.
     constexpr double kNoFractions = 6755399441055744.0; // 3 · 2⁵¹
     double count = degrees / 90.0 + kNoFractions - kNoFractions;
     double rest = degrees - count * 90.0;
@@ -142,7 +142,7 @@ SinCos sinCosDegrees(double degrees) {
     const double radians = rest * FBXSDK_PI_DIV_180;
     const double s = std::sin(radians);
     const double c = std::cos(radians);
-    // a zero sine has the sign of the angle, a zero cosine none: then atan2 gives ±180 back as it went in
+    // a zero sine has the sign of the angle, a zero cosine none: then atan2 returns ±180 with the sign of the input
     const auto sine = [degrees](double value) { return value == 0.0 ? std::copysign(0.0, degrees) : value; };
     switch (static_cast<unsigned>(quadrant) & 3U) {
     case 0:

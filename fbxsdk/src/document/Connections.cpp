@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Connections: reading their records, and making the set of them sound: both ends exist, none is doubled, and the
+// Connections: reading their records, and validating the set of them: both ends exist, none is duplicated, and the
 // Models form a tree below the root.
 #include <algorithm>
 #include <array>
@@ -15,7 +15,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Where the ends stand in a connection record; -1 for a property that this kind of connection does not name.
+/// The positions of the ends in a connection record; -1 for a property that this kind of connection does not name.
 struct ConnectionLayout {
     std::string_view type;
     int source, sourceProperty, destination, destinationProperty;
@@ -27,7 +27,7 @@ constexpr ConnectionLayout kConnectionLayouts[] = {
     {"PP", 1, 2, 3, 4},
 };
 
-/// Models of these names stay out of the node tree when nothing connects them to it: they are the application's views.
+/// Models of these names stay out of the node tree when no connection includes them: they are the application's views.
 bool isViewModel(const DocumentObject& object) {
     if (object.subClass == "CameraSwitcher")
         return object.name == kCameraSwitcherName;
@@ -93,7 +93,7 @@ private:
         return static_cast<std::uint32_t>(&object - mDocument.objects.data());
     }
 
-    /// The Model that the connection gives a parent; null when it is not of that kind.
+    /// The Model to which the connection gives a parent; null when it is not of that kind.
     [[nodiscard]] const DocumentObject* childOf(const DocumentConnection& connection) const {
         if (!connection.sourceProperty.empty() || !connection.destinationProperty.empty())
             return nullptr;
@@ -119,7 +119,7 @@ private:
         connections.resize(kept);
     }
 
-    /// The index of the Model's parent; kNone below the root and without a parent.
+    /// The index of the Model's parent; kNone below the root and for unparented Models.
     [[nodiscard]] std::uint32_t parentOf(std::uint32_t model) const {
         const std::uint32_t edge = mParentEdge[model];
         if (edge == kNone || mDocument.connections[edge].destination == 0)
@@ -127,7 +127,7 @@ private:
         return indexOf(*mDocument.find(mDocument.connections[edge].destination));
     }
 
-    /// Walks up from every Model once; whoever meets its own walk again closes a cycle.
+    /// Walks up from every Model once; a walk that meets itself again has found a cycle.
     void breakCycles() {
         constexpr std::uint32_t kUnseen = 0;
         std::vector<std::uint32_t> walkOf(mDocument.objects.size(), kUnseen);

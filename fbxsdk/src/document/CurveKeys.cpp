@@ -35,7 +35,7 @@ void CurveKeys::setAttributes(std::size_t key, const KeyAttributes& keyAttribute
         attributeOfKey[key] = attributeOfKey[key - 1];
         return;
     }
-    // A key that is set in several steps has several kinds of attributes, in turn with those of the keys before.
+    // A key that is set in several steps alternates between several attributes and those of the keys before.
     constexpr std::size_t kLatest = 4;
     const std::size_t oldest = attributes.size() - std::min(attributes.size(), kLatest);
     for (std::size_t i = attributes.size(); i > oldest; --i) {

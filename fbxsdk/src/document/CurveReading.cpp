@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The keys of animation curves: the packed arrays of 7.x files, and what holds for the curves of all generations.
+// The keys of animation curves: the packed arrays of 7.x files, and the common rules for curves of all generations.
 #include <algorithm>
 #include <bit>
 #include <numeric>
@@ -35,7 +35,7 @@ float unpackedVelocity(std::uint32_t halfWord) {
     return static_cast<float>(static_cast<std::int16_t>(halfWord & 0xFFFFU)) / kPackedUnit;
 }
 
-/// Weights and velocities count only where the flags say so.
+/// Weights and velocities are used only where the flags say so.
 void unpackWeights(KeyAttributes& attribute, std::span<const std::uint32_t> words) {
     if (attribute.flags & KeyFlag::weightedRight)
         attribute.data[2] = unpackedWeight(words[2]);
@@ -76,7 +76,7 @@ std::vector<KeyAttributes> readAttributes(const Record& body) {
     return attributes;
 }
 
-/// Attribute j holds for as many keys in a row as its count says; the last one for all that are left.
+/// Attribute j applies to as many consecutive keys as its count says; the last one to all remaining keys.
 std::vector<std::uint32_t> spreadAttributes(std::span<const std::int32_t> counts, std::size_t attributeCount,
                                             std::size_t keyCount) {
     std::vector<std::uint32_t> indices;

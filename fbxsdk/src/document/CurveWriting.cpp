@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The mirror of CurveReading and LegacyKeys.
+// The inverse of CurveReading and LegacyKeys.
 #include "document/DocumentSections.h"
 
 #include <algorithm>
@@ -15,7 +15,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// The weight that counts where the flags name none: a third.
+/// The weight where the flags set none: a third.
 constexpr std::uint32_t kDefaultPackedWeight = 3333;
 
 std::uint32_t packedWeight(float weight, bool given) {
@@ -99,7 +99,7 @@ const Row& rowOf(const Row (&rows)[Count], std::uint32_t flags) {
     return *std::find_if(std::begin(rows), std::end(rows), [=](const Row& row) { return row.flags == flags; });
 }
 
-/// What a cubic key is written as: its tangents by user or TCB, or else automatic ones, which have no letter for more.
+/// How a cubic key is written: user or TCB tangents, or else automatic ones, whose letters say no more.
 std::uint32_t legacyTangent(const KeyAttributes& attribute) {
     if (isTcb(attribute))
         return KeyFlag::tangentTcb;

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Look-ups in a document.
 #include "document/Document.h"
 
 #include <algorithm>

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// One shape for files of every generation: objects with properties, and connections. Files of the 5.x and 6.x
-// generations are translated here, once, into what a 7.x file would have said; later stages never ask for a version.
+// One form for files of every generation: objects with properties, and connections. Files of the 5.x and 6.x
+// generations are translated here, once, to the form of a 7.x file; later stages are independent of the version.
 #pragma once
 
 #include <cstdint>
@@ -24,10 +24,10 @@ namespace detail {
 class RecordSink;
 struct VersionTraits;
 
-/// Ticks of one second in everything behind this stage, whatever unit the file counts in.
+/// Ticks of one second in all later stages, whatever unit the file counts in.
 inline constexpr std::int64_t kTicksPerSecond = 46186158000;
 
-/// One `P:` line (or what stands for it in an older file).
+/// One `P:` line (or its counterpart in an older file).
 struct DocumentProperty {
     std::string_view name;
     std::string_view typeName;     ///< "Lcl Translation", "double", "KString", …
@@ -36,18 +36,18 @@ struct DocumentProperty {
     std::span<const Value> values; ///< times (type "KTime") are already in ticks of kTicksPerSecond
 };
 
-/// Writes some of an object's records. Called while the document is written, so that large arrays exist one at a time.
+/// Writes some of an object's records. Called while the document is written, so that one large array exists at a time.
 using WriteRecords = std::function<void(RecordSink& sink, const VersionTraits& traits)>;
 using UseKeys = std::function<void(const CurveKeys& keys)>;
 
-/// What an object that is to be written has where one that was read has its sub-records.
+/// An object to be written has this instead of the sub-records of one that was read.
 struct ObjectContent {
-    std::string_view nameClass; ///< what stands before "::" in its name
-    /// The class whose template would hold the defaults; empty for a class without one.
+    std::string_view nameClass; ///< the part before "::" in its name
+    /// The class whose template holds the defaults; empty for a class without one.
     std::string_view templateClass;
     WriteRecords before; ///< the records before the properties …
-    WriteRecords after;  ///< … and behind them; either may be empty
-    /// Of a curve: shows its keys, with tangents that the version has.
+    WriteRecords after;  ///< … and after them; either may be empty
+    /// Of a curve: returns its keys, with tangents that the version supports.
     std::function<void(const VersionTraits& traits, const UseKeys& use)> curve;
 };
 
@@ -57,7 +57,7 @@ struct DocumentObject {
     std::string_view record;   ///< "Model", "NodeAttribute", "Geometry", "Deformer", "Material", "AnimationCurve", …
     std::string_view subClass; ///< "Mesh", "Camera", "LimbNode", "Skin", "Cluster", … may be empty
     std::string_view name;     ///< without the class prefix; may be empty; bytes as in the file
-    /// To be written from 7.x on: those that differ from the defaults, before that all of them.
+    /// To be written: from 7.x on those that differ from the defaults, before that all of them.
     std::vector<DocumentProperty> properties;
     /// The object's sub-records in 7.x spelling (Vertices, LayerElementNormal, Shading, Indexes, …). Never null in a
     /// document that was read.
@@ -91,7 +91,7 @@ struct DocumentTake {
     bool hasLocal = false, hasReference = false;
 };
 
-/// Fog and ambient light, which have a place in files before 7.x only.
+/// Fog and ambient light, which only files before 7.x can hold.
 struct DocumentLightSettings {
     bool hasAmbient = false, hasFog = false;
     double ambientColor[4] = {0, 0, 0, 1};
@@ -101,7 +101,7 @@ struct DocumentLightSettings {
     double fogColor[4] = {1, 1, 1, 1};
 };
 
-/// What was read, or is to be written. Views point into `tree`, or into the scene that is written.
+/// A document that was read, or is to be written. Views point into `tree`, or into the scene that is written.
 struct Document {
     std::unique_ptr<RecordTree> tree;                  ///< owns values and texts
     std::uint32_t version = 0;                         ///< of the document: 3000, 5000, 5800, 6100, 7100 … 7700
@@ -115,14 +115,14 @@ struct Document {
     std::string activeStackName;
     std::vector<DocumentTemplate> templates;
     std::vector<DocumentObject> objects;         ///< in file order; ids are unique and not 0
-    std::vector<DocumentConnection> connections; ///< in file order; both ends exist (or the root), none doubled
+    std::vector<DocumentConnection> connections; ///< in file order; both ends exist (or the root), none is duplicated
     std::vector<DocumentTake> takes;
     std::vector<CurveKeys> legacyCurves;
-    /// What was repaired or dropped, a sentence each, with its place; bounded in number.
+    /// What was repaired or dropped, one sentence each, with its place; bounded in number.
     std::vector<std::string> warnings;
 
     [[nodiscard]] const DocumentObject* find(std::int64_t objectId) const;
-    /// Keeps values for a property.
+    /// Stores values for a property.
     [[nodiscard]] std::span<const Value> keep(std::initializer_list<Value> values);
 
     std::vector<std::pair<std::int64_t, std::uint32_t>> idIndex; ///< sorted; filled by readDocument
@@ -130,15 +130,15 @@ struct Document {
 
 /// Reads a file of any generation. Null on failure; the status then names the file, the place and the fault.
 [[nodiscard]] std::unique_ptr<Document> readDocument(const std::string& fileName, FbxStatus& status);
-/// The same from a record tree that is already there.
+/// The same from an existing record tree.
 [[nodiscard]] std::unique_ptr<Document> readDocument(std::unique_ptr<RecordTree> tree, FbxStatus& status);
 
-/// Writes all records of the document, of the generation that the traits tell. Stops early when the sink fails; whether
-/// it did, the sink says.
+/// Writes all records of the document, of the generation of the traits. Stops early when the sink fails; the sink
+/// reports that.
 void writeDocument(Document& document, const VersionTraits& traits, RecordSink& sink);
 
 /// The keys of an object of record "AnimationCurve", whichever generation it came from. Times and values of different
-/// length are cut to the shorter; unsorted keys are sorted, of equal times the later wins.
+/// length are cut to the shorter; unsorted keys are sorted; of equal times the later is kept.
 [[nodiscard]] CurveKeys readCurve(const Document& document, const DocumentObject& object);
 
 } // namespace detail

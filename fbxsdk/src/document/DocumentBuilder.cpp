@@ -52,7 +52,7 @@ void DocumentBuilder::indexObjects() {
         index.reserve(objects.size());
         for (std::size_t i = 0; i < objects.size(); ++i)
             index.emplace_back(objects[i].id, static_cast<std::uint32_t>(i));
-        std::sort(index.begin(), index.end()); // of equal ids the one that comes first in the file leads
+        std::sort(index.begin(), index.end()); // of equal ids, the first in the file comes first
     };
     fill();
     std::vector<bool> doubled(objects.size(), false);

@@ -1,8 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A document under construction: what the readers of all generations share. Views handed in must live as long as the
-// record tree; the functions that make values and records store them there.
 #pragma once
 
 #include <initializer_list>
@@ -17,6 +14,8 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+/// A document under construction: the common part of the readers of all generations. Views passed in must be valid as
+/// long as the record tree; the functions that make values and records store them there.
 class DocumentBuilder {
 public:
     DocumentBuilder(std::unique_ptr<RecordTree> tree, std::uint32_t version);
@@ -28,7 +27,7 @@ public:
 
     /// An id that no object of the index has. In files without ids of their own they are 1, 2, 3, …
     [[nodiscard]] std::int64_t newId();
-    /// Appends an object. The reference is good until the next one is added.
+    /// Appends an object. The reference is valid until the next one is added.
     DocumentObject& addObject(std::int64_t id, std::string_view record, std::string_view subClass,
                               std::string_view name, const Record* body = nullptr);
     /// Sorts the ids. Of objects with the same id the first stays.
@@ -37,12 +36,12 @@ public:
     void connect(std::int64_t source, std::int64_t destination, std::string_view destinationProperty = {},
                  std::string_view sourceProperty = {});
 
-    /// Notes a repair. After a bounded number of sentences the rest is only counted.
+    /// Records a repair. Beyond a limited number of sentences the rest is only counted.
     void warn(std::string sentence);
     /// The same with the record's place in front.
     void warn(const Record& record, const std::string& sentence);
 
-    // Values and records that stand for what an older file says otherwise.
+    // Values and records equivalent to what an older file states in another form.
     [[nodiscard]] std::span<const Value> keep(std::initializer_list<Value> values);
     [[nodiscard]] std::span<const Value> keepReals(std::span<const double> numbers);
     /// The first `count` numbers of a record as single values, whether it stores scalars or an array.
@@ -63,7 +62,7 @@ private:
     std::size_t mSilentWarnings = 0;
 };
 
-/// Appends records below one in order, without walking the list each time.
+/// Appends records below one in order, without traversing the list each time.
 class ChildAppender {
 public:
     explicit ChildAppender(Record& parent) : mParent(parent) { parent.hasBlock = true; }
@@ -74,21 +73,21 @@ private:
     Record* mLast = nullptr;
 };
 
-/// One `P` or `Property` line: a name, its types and flags, and values behind them.
+/// One `P` or `Property` line: a name, its types and flags, followed by values.
 [[nodiscard]] DocumentProperty propertyOf(std::string_view name, std::string_view typeName,
                                           std::string_view subTypeName, std::string_view flags,
                                           std::span<const Value> values);
 
-/// A name from the file as part of a sentence: in quotes, and cut when it is very long.
+/// A name from the file as part of a sentence: in quotes, and truncated when it is very long.
 [[nodiscard]] std::string quotedName(std::string_view name);
 
 /// The name without its class: `name 00 01 class` of a binary file, `class::name` of an ASCII one.
 [[nodiscard]] std::string_view nameWithoutClass(std::string_view fullName, bool ascii);
 
-/// Drops what cannot be connected and makes the Models a tree; see DocumentConnection for what then holds.
+/// Drops what cannot be connected and makes the Models a tree; DocumentConnection states the result.
 void cleanConnections(DocumentBuilder& builder);
 
-/// The ends of a connection record in whatever form the generation names objects.
+/// The ends of a connection record, however the generation refers to objects.
 struct ConnectionEnds {
     const Value* source = nullptr; ///< null when the record is no connection
     const Value* destination = nullptr;
@@ -96,14 +95,14 @@ struct ConnectionEnds {
 };
 [[nodiscard]] ConnectionEnds connectionEnds(const Record& record);
 
-// The readers, by generation. Each fills objects and connections; the rest is common.
+// The readers, by generation. Each reads objects and connections; the rest is common.
 void readGeneration7(DocumentBuilder& builder);
 void readGeneration6(DocumentBuilder& builder);
 bool readGeneration5(DocumentBuilder& builder, FbxStatus& status);
 
 /// False, with the line in the status, when a line of an ASCII file holds more numbers than a value of its type has.
 /// Such files come from programs that spell numbers with the decimal comma of their country: of "35,5" only 35 would be
-/// read, and every number behind it in the wrong place. Properties of users may hold bounds behind the value.
+/// read, and every later number would be misplaced. Properties of users may hold bounds after the value.
 [[nodiscard]] bool checkValueCounts(const RecordTree& tree, FbxStatus& status);
 
 } // namespace detail

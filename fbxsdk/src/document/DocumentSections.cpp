@@ -40,13 +40,13 @@ void writeMetaData(RecordSink& sink) {
         writeText(sink, name, "");
 }
 
-/// Who made the scene first and who saved it last, which here is the same.
+/// Who created the scene and who saved it last, which here is the same.
 std::vector<DocumentProperty> originOf(std::string_view gmt, std::vector<std::array<Value, 1>>& values) {
     struct Row {
         std::string_view name, typeName, subTypeName;
-        std::optional<std::string_view> text; ///< none for what holds nothing itself
+        std::optional<std::string_view> text; ///< none for objects without data
     };
-    constexpr std::string_view kUnstated; // the same scene gives the same bytes whatever saves it, and wherever
+    constexpr std::string_view kUnstated; // the same scene gives the same bytes, whatever the program and the machine
     const Row rows[] = {{"DocumentUrl", "KString", "Url", kUnstated},
                         {"SrcDocumentUrl", "KString", "Url", kUnstated},
                         {"Original", "Compound", "", std::nullopt},

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The parts of a file that are alike in all generations, and the two writers.
+// The parts of a file that are common to all generations, and the two writers.
 #pragma once
 
 #include <span>
@@ -15,14 +15,14 @@ namespace detail {
 
 /// FBXHeaderExtension, and in binary files the file's id, time and creator.
 void writeHeader(const Document& document, const VersionTraits& traits, RecordSink& sink);
-/// What the header of 7.x files and an object of older ones hold about the scene's origin.
+/// What the header of 7.x files and an object of older ones state about the scene's origin.
 void writeSceneInfo(const Document& document, const VersionTraits& traits, RecordSink& sink);
 
 /// One kind of object and how many there are.
 struct ObjectCount {
     std::string_view record;
     std::int32_t count = 0;
-    const DocumentObject* first = nullptr; ///< null for what is no object of its own
+    const DocumentObject* first = nullptr; ///< null for kinds without an object of their own
 };
 /// Kinds in order of their first object.
 [[nodiscard]] std::vector<ObjectCount> countObjects(const Document& document);
@@ -39,8 +39,8 @@ void writeGeneration6(const Document& document, const VersionTraits& traits, Rec
 /// The records of an AnimationCurve: packed arrays.
 void writeCurve(RecordSink& sink, const VersionTraits& traits, const CurveKeys& curve);
 
-/// The records of a channel of a take: one list of keys. Automatic tangents with a bias, a break or a clamp have no
-/// letter in it; they must be user tangents by now.
+/// The records of a channel of a take: one list of keys. It has no letter for automatic tangents with a bias, a break
+/// or a clamp; they must be user tangents by now.
 void writeLegacyCurve(RecordSink& sink, const VersionTraits& traits, const CurveKeys& curve, double defaultValue);
 
 /// `Properties70 { P: name, type, subtype, flags, values }`.

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Which generation is written, and what becomes of parts that it keeps elsewhere.
+// Which generation is written, and the conversion of parts that it keeps elsewhere.
 #include "document/DocumentSections.h"
 #include "document/legacy/InlineShapes.h"
 

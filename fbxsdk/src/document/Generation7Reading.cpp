@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files of the 7.x generation: numbered objects and connections between the numbers. Little is to be translated.
+// Files of the 7.x generation: numbered objects and connections between the numbers, with little translation.
 #include <algorithm>
 
 #include "document/DocumentBuilder.h"
@@ -100,7 +100,7 @@ void readDocuments(DocumentBuilder& builder, const Record& list) {
                 builder.document().activeStackName = property.values.front().toText();
 }
 
-/// The top-level records that say something, whatever their order.
+/// The top-level records that are read, in any order.
 struct Section {
     std::string_view name;
     void (*read)(DocumentBuilder&, const Record&);

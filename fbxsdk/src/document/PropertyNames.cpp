@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Names of properties by class and generation.
 #include "document/PropertyNames.h"
 
 #include <algorithm>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What properties were called in older files, and whom they belong to.
+// The names of properties in older files, and the objects that they belong to.
 #pragma once
 
 #include <string_view>
@@ -18,15 +18,15 @@ namespace detail {
 /// The present name of a property of a node attribute ("Light", "Camera" or the class names "FbxLight", "FbxCamera").
 [[nodiscard]] std::string_view modernPropertyName(std::string_view subClass, std::string_view name);
 
-/// How files before 7.0 call a property of a kind of attribute.
+/// The name in files before 7.0 of a property of a kind of attribute.
 [[nodiscard]] std::string_view legacyPropertyName(std::string_view subClass, std::string_view name);
 
-/// Gives old properties of lights and cameras their present names, unless the list has a property of that name.
+/// Renames old properties of lights and cameras to their present names, unless the list has a property of that name.
 /// `record` is the object's record name; only node attributes have such properties.
 void modernizePropertyNames(std::string_view record, std::string_view subClass,
                             std::vector<DocumentProperty>& properties);
 
-/// The flags of a node attribute's property without the letter N, which says whose property it is.
+/// The flags of a node attribute's property without the letter N, which states to which object it belongs.
 [[nodiscard]] std::string_view attributeFlags(RecordTree& tree, std::string_view flags);
 
 } // namespace detail

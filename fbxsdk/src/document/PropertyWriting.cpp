@@ -20,7 +20,7 @@ struct TypeRow {
     std::string_view typeName;
     Storage storage;
 };
-/// Every other type holds reals.
+/// Every other type holds floating-point numbers.
 constexpr TypeRow kTypes[] = {
     {"bool", Storage::integer},
     {"Bool", Storage::integer},
@@ -51,7 +51,7 @@ Storage storageOf(std::string_view typeName) {
 }
 
 void writeValue(RecordSink& sink, const Value& value, Storage storage) {
-    // A text among numbers, the choices of an enumeration or a unit, stays a text.
+    // A text among numbers, the choices of an enumeration or a unit, is written as text.
     if (value.type == Value::Type::text || storage == Storage::text) {
         sink.text(value.toText());
         return;

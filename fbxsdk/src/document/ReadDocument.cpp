@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Which generation a file is of, and what all of them have in common.
+// The generation of a file, and the common part of reading all of them.
 #include <limits>
 
 #include "container/FileFormat.h"
@@ -14,7 +14,7 @@ namespace {
 
 constexpr std::uint32_t kFirstVersionOfGeneration6 = 6000;
 constexpr std::uint32_t kFirstVersionOfGeneration7 = 7000;
-/// What binary files before 6.0 state, whatever their document's version.
+/// The version that binary files before 6.0 state, whatever their document's version.
 constexpr std::uint32_t kOldContainerVersion = kOldestVersion;
 
 std::uint32_t statedVersion(const Record& root) {
@@ -24,7 +24,7 @@ std::uint32_t statedVersion(const Record& root) {
                                                                                : 0;
 }
 
-/// Whether any object of the file is known by a number (from 7.0 on) or by its name (6.x).
+/// Whether any object of the file is identified by a number (from 7.0 on) or by its name (6.x).
 bool hasObjects(const Record& root, bool numbered) {
     for (const Record& section : root.children())
         if (section.name == "Objects")
@@ -50,7 +50,7 @@ std::uint32_t versionOf(const RecordTree& tree) {
     return tree.version != 0 ? tree.version : likelyVersion(tree.root);
 }
 
-/// Newer headers may choose the short time unit.
+/// Newer headers may select the short time unit.
 std::int64_t ticksPerSecondOf(const Record& root) {
     constexpr std::int64_t kFirstHeaderVersion = 1004;
     constexpr std::int64_t kUsualUnit = 127;
@@ -68,14 +68,14 @@ std::string creatorOf(const Record& root) {
     return std::string(creator.empty() && header ? header->childValue("Creator").toText() : creator);
 }
 
-/// The version decides, except in a file whose objects are all of the other kind.
+/// The version decides, except in a file whose objects are all in the other form.
 bool isGeneration7(std::uint32_t version, const Record& root) {
     const bool stated = version >= kFirstVersionOfGeneration7;
     const bool fits = hasObjects(root, /*numbered*/ stated) || !hasObjects(root, /*numbered*/ !stated);
     return fits ? stated : !stated;
 }
 
-/// Whether the counts at the head of the file promise objects of this kind; without a kind, any.
+/// Whether the counts in the head of the file state objects of this kind; without a kind, any.
 bool promises(const Record& root, std::string_view kind = {}) {
     const Record* definitions = root.child("Definitions");
     if (!definitions)
@@ -89,13 +89,13 @@ bool promises(const Record& root, std::string_view kind = {}) {
     return false;
 }
 
-/// Whether a section is missing that was promised, or has a name and nothing else.
+/// Whether a section is missing although its content is stated, or has a name and nothing else.
 bool lacks(const Record& root, std::string_view section, bool promised) {
     const Record* record = root.child(section);
     return record ? !record->hasBlock : promised;
 }
 
-/// Nothing marks the end of a text: one that was cut off between two sections looks whole, and would be an empty scene.
+/// A text has no end mark: a file truncated between two sections looks complete, and would be an empty scene.
 bool checkSections(const RecordTree& tree, FbxStatus& status) {
     const char* missing = nullptr;
     if (tree.ascii && lacks(tree.root, "Objects", promises(tree.root)))

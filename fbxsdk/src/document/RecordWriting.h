@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The usual records in one line each.
+// The common records in one line each.
 #pragma once
 
 #include <exception>
@@ -32,8 +32,8 @@ void writeArray(RecordSink& sink, std::string_view name, std::span<const Number>
     sink.endRecord();
 }
 
-/// A record with a block, open as long as the object lives. To end it may take memory that there is not; a record that
-/// an exception leaves is not ended, since nobody is going to read it.
+/// A record with a block, open as long as the object exists. Ending it may need memory; a record that
+/// is left by an exception is not ended, since the output is discarded.
 class BlockScope {
 public:
     BlockScope(RecordSink& sink, std::string_view name) : mSink(sink) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Whether two records say the same, all the way down.
+// Whether two records are equal, with all their descendants.
 #pragma once
 
 #include <span>

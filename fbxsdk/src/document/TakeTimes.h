@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The times of takes and stacks: what the Takes section says of a stack holds where the stack itself says nothing.
+// The times of takes and stacks: those of the Takes section apply where the stack itself states none.
 #pragma once
 
 #include <vector>
@@ -17,7 +17,7 @@ void readTakeTimes(DocumentBuilder& builder, const Record& takes);
 /// Adds the times that the take has as properties of its animation stack.
 void addTakeTimes(DocumentBuilder& builder, const DocumentTake& take, std::vector<DocumentProperty>& properties);
 
-/// Gives every stack without times of its own those of the take of its name.
+/// Gives every stack without times of its own those of the take with its name.
 void fillStackTimes(DocumentBuilder& builder);
 
 /// One for every stack of the document, with its times; of a file that lists takes and has no stacks, those.

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The property lines of ASCII files, held against the table of their types.
+// The property lines of ASCII files, checked against the table of their types.
 #include "document/DocumentBuilder.h"
 
 #include <algorithm>
@@ -55,7 +55,7 @@ constexpr TypeRow kTypes[] = {
     {"Distance", 1},
 };
 
-/// What stands before the values, by the name of the list: name, type, in newer files its kind, flags.
+/// The number of entries before the values, by the name of the list: name, type, in newer files its kind, flags.
 struct ListRow {
     std::string_view list, line;
     std::size_t texts;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The span of keys of a node and everything below it on one layer.
+// The span of keys of a node and all its descendants on one layer.
 #include <vector>
 
 #include <fbxsdk/FbxAnimCurveNode.h>
@@ -36,7 +36,7 @@ public:
 
 private:
     void visitProperties(FbxObject& object) {
-        // Only properties that somebody connected something to can be animated.
+        // Only properties with a connection can be animated.
         for (const detail::PropertyData* property : object.data().properties()) {
             for (const detail::ConnectionPoint* source : property->plug.sources) {
                 if (source->property < 0)

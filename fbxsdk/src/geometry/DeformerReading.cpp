@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Skins, clusters and blend shape channels. A cluster's file says where the deformed geometry's node stood as seen from
-// the link; objects say where it stood in the world.
+// Skins, clusters and blend shape channels. A cluster in a file states the transform of the deformed geometry's node
+// relative to the link; objects hold its global transform.
 #include "geometry/GeometryReading.h"
 
 #include <algorithm>
@@ -21,7 +21,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Sixteen numbers, the translation in the last four. What the last column says is not believed: the matrix is affine.
+/// Sixteen numbers, the translation in the last four. The last column is ignored: the matrix is affine.
 std::optional<FbxAMatrix> readMatrix(const Record& body, std::string_view name) {
     const Record* record = body.child(name);
     std::array<double, 16> numbers{};
@@ -80,7 +80,7 @@ void readChannel(FbxBlendShapeChannel& channel, const DocumentObject& object) {
         if (record->readNumbers(std::span<double>(weights)))
             channel.setFullWeights(std::move(weights));
     }
-    // The property, where there is one, is the newer truth.
+    // The property, where there is one, takes precedence.
     const Value& percent = object.body->childValue("DeformPercent");
     if (percent.isNumber() && !object.property("DeformPercent"))
         channel.DeformPercent.Set(percent.toReal());

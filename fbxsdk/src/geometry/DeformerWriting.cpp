@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Skins, clusters, blend shapes and cache deformers: the mirror of DeformerReading.
+// Skins, clusters, blend shapes and cache deformers: the inverse of DeformerReading.
 #include <string_view>
 #include <vector>
 
@@ -36,7 +36,7 @@ void writeMatrix(RecordSink& sink, std::string_view name, const FbxAMatrix& matr
     writeArray<double>(sink, name, numbers);
 }
 
-/// Normalising is what an absent record means.
+/// An absent record means normalising.
 void writeLinkMode(RecordSink& sink, FbxCluster::ELinkMode mode) {
     if (mode != FbxCluster::eNormalize)
         writeText(sink, "Mode", spellingOf(kLinkModes, mode, FbxCluster::eNormalize));
@@ -50,7 +50,7 @@ void writePoints(RecordSink& sink, const FbxCluster& cluster) {
     writeArray<double>(sink, "Weights", {cluster.GetControlPointWeights(), count});
 }
 
-/// Files state where the deformed geometry stood as seen from the link.
+/// Files state the transform of the deformed geometry relative to the link.
 void writeCluster(const FbxCluster& cluster, RecordSink& sink) {
     FbxAMatrix transform, link, associate;
     cluster.GetTransformMatrix(transform);

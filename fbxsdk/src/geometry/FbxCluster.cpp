@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Clusters. The associate model hangs on a property, as older files have it, since a plain source node is the link.
+// Clusters. The associate model is connected to a property, as in older files, since a plain source node is the link.
 #include <fbxsdk/FbxCluster.h>
 
 #include <algorithm>
@@ -30,7 +30,7 @@ void FbxCluster::SetLink(const FbxNode* pNode) {
     while (mLink && DisconnectSrcObject(mLink)) {
     }
     if (pNode)
-        ConnectSrcObject(const_cast<FbxNode*>(pNode)); // the API takes it so; a connection changes both ends
+        ConnectSrcObject(const_cast<FbxNode*>(pNode)); // the API takes a const node; a connection changes both ends
 }
 
 void FbxCluster::SetAssociateModel(FbxNode* pNode) {
@@ -49,7 +49,7 @@ FbxNode* FbxCluster::GetAssociateModel() const {
 }
 
 void FbxCluster::AddControlPointIndex(int pIndex, double pWeight) {
-    // What a file has too many of one of them counts for nothing.
+    // Surplus entries of either list are ignored.
     const int count = GetControlPointIndicesCount();
     mIndices.resizeUninitialised(count);
     mWeights.resizeUninitialised(count);

@@ -31,7 +31,7 @@ T* withStatus(T* found, FbxStatus* status) {
     return found;
 }
 
-/// Null for what is no type.
+/// Null for an invalid type.
 const FbxClassId* classOf(FbxDeformer::EDeformerType type) {
     switch (type) {
     case FbxDeformer::eSkin:
@@ -67,7 +67,7 @@ FbxDeformer* FbxGeometry::GetDeformer(int pIndex, FbxStatus* pStatus) const {
     return withStatus(detail::sourceAt(mDeformers, pIndex), pStatus);
 }
 
-// Deformers are the geometry's sources, which know those of a class.
+// Deformers are sources of the geometry, which lists those of a class.
 
 int FbxGeometry::GetDeformerCount(FbxDeformer::EDeformerType pType) const {
     const FbxClassId* id = classOf(pType);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The new mesh is finished before anything is touched: what cannot be converted stays as it was.
+// The new mesh is completed before anything is changed: what cannot be converted stays unchanged.
 #include <fbxsdk/FbxGeometryConverter.h>
 
 #include <algorithm>
@@ -36,7 +36,7 @@ FbxMesh* newMeshFor(const FbxGeometry& geometry) {
     return mesh;
 }
 
-/// A surface on its way to a mesh: how it will be sampled, and out of what.
+/// A surface during its conversion: how it will be sampled, and its data.
 class SurfaceConversion {
 public:
     explicit SurfaceConversion(FbxGeometry& surface)
@@ -45,7 +45,7 @@ public:
 
     [[nodiscard]] bool isCoarser() const { return mPlan && mPlan->coarser; }
 
-    /// Null for what has no samples. The mesh is empty when it may be filled later.
+    /// Null without samples. The mesh is empty when it may be filled later.
     [[nodiscard]] FbxMesh* convert() {
         if (!mPlan)
             return nullptr;
@@ -66,7 +66,7 @@ public:
         return mesh;
     }
 
-    /// Leaves the surface to the mesh, which fills itself when it is asked for its polygons.
+    /// Transfers the surface to the mesh, which fills itself when its polygons are first accessed.
     void leaveTo(FbxMesh& mesh) const {
         mSurface.data().disconnectFromSurvivors();
         auto source = std::make_shared<detail::MeshOfSurface>(mSurface, mFewest);
@@ -117,7 +117,7 @@ std::vector<FbxNode*> nodesOf(const FbxNodeAttribute& attribute) {
     return nodes;
 }
 
-/// In the former one's place, so that the node's choice among its attributes still stands.
+/// At the index of the former one, so that the node's default attribute remains the same.
 void replaceOn(FbxNode& node, FbxNodeAttribute& former, FbxNodeAttribute& mesh) {
     std::vector<FbxNodeAttribute*> attributes;
     attributes.reserve(static_cast<std::size_t>(node.GetNodeAttributeCount()));
@@ -132,11 +132,11 @@ void replaceOn(FbxNode& node, FbxNodeAttribute& former, FbxNodeAttribute& mesh) 
         node.ConnectSrcObject(*place);
 }
 
-/// False when something else needs the former one.
+/// False when another object needs the former one.
 bool replaceEverywhere(FbxGeometry& former, FbxMesh& mesh) {
     for (FbxNode* node : nodesOf(former))
         replaceOn(*node, former, mesh);
-    // A trimmed surface still needs what it is cut from.
+    // A trimmed surface still needs the surface that is cut.
     if (former.GetDstObjectCount<FbxNodeAttribute>() > 0)
         return false;
     detail::destroyDeformers(former);

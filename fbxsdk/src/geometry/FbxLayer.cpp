@@ -48,7 +48,7 @@ void FbxLayerContainer::ClearLayers() {
 int FbxLayerContainer::GetLayerCount(FbxLayerElement::EType pType, bool pUVCount) const {
     if (pType <= FbxLayerElement::eUnknown || pType >= FbxLayerElement::eTypeCount)
         return 0;
-    // The type "UV" alone means the ordinary set.
+    // The type "UV" by itself means the default set.
     const FbxLayerElement::EType type = pType == FbxLayerElement::eUV ? FbxLayerElement::eTextureDiffuse : pType;
     const bool isUv = FbxLayer::isTextureChannel(type) && (pUVCount || pType == FbxLayerElement::eUV);
     const int slot = isUv ? FbxLayer::uvSlot(type) : type;
@@ -65,9 +65,9 @@ void FbxLayerContainer::detachSource() {
 }
 
 void FbxLayerContainer::loadSource() const {
-    // Without its source the object is an ordinary one for whatever the reader calls. The content was there all along:
-    // that it is fetched only now is no change of the object. What could not be fetched is no empty object, but fails
-    // again for whoever asks next.
+    // Without its source the object is an ordinary one for the reader's calls. The content is logically part of the
+    // object: reading it late does not change the object. If it cannot be read, the object does not become empty; the
+    // next access fails again.
     std::unique_ptr<detail::GeometrySource> source = std::move(mSource);
     try {
         if (!const_cast<FbxLayerContainer*>(this)->readSource(*source))
@@ -79,7 +79,7 @@ void FbxLayerContainer::loadSource() const {
 }
 
 void FbxLayerContainer::removeElementEntries(FbxLayerElement::EMappingMode pMappingMode, int pFirst, int pCount) {
-    std::vector<FbxLayerElement*> touched; // an element that stands in two layers is cut once
+    std::vector<FbxLayerElement*> touched; // an element in two layers is changed once
     for (const auto& layer : mLayers) {
         for (FbxLayerElement* element : layer->mElements) {
             if (!element || element->GetMappingMode() != pMappingMode)

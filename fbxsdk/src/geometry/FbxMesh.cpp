@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Polygons, and what layer 0 holds for their corners.
+// Polygons, and the elements of layer 0 for their corners.
 #include <fbxsdk/FbxMesh.h>
 
 #include <fbxsdk/FbxNode.h>
@@ -18,7 +18,7 @@ FBXSDK_OBJECT_IMPLEMENT(FbxMesh, FbxGeometry, detail::kMeshRows)
 
 namespace {
 
-/// Where an element keeps the value of item i; -1 when it has none.
+/// The index of an element's value for item i; -1 when it has none.
 template <class T>
 int valueIndex(const FbxLayerElementTemplate<T>& element, int item) {
     if (element.GetReferenceMode() == FbxLayerElement::eDirect)
@@ -27,7 +27,7 @@ int valueIndex(const FbxLayerElementTemplate<T>& element, int item) {
     return item >= 0 && item < indices.GetCount() ? indices.GetAt(item) : -1;
 }
 
-/// Makes an index array say the value for one item, with zeros for items before it that nobody has set.
+/// Sets the entry of an index array for one item, with zeros for earlier items that are not set.
 void setIndex(FbxLayerElementArrayTemplate<int>& indices, int item, int value) {
     if (indices.GetCount() <= item)
         indices.SetCount(item + 1);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// NURBS surfaces, those of today's and those of older writers.
+// NURBS surfaces, those of newer and those of older writers.
 #include <fbxsdk/FbxNurbs.h>
 #include <fbxsdk/FbxNurbsSurface.h>
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Memory by realloc: large arrays grow without being copied, and new items cost nothing until they are written.
+// Memory by realloc: large arrays grow without being copied, and new items take no memory until they are written.
 #include <fbxsdk/FbxPlainArray.h>
 
 #include <climits>
@@ -19,7 +19,7 @@ std::byte* itemAt(void* items, int index, std::size_t itemSize) {
     return static_cast<std::byte*>(items) + static_cast<std::size_t>(index) * itemSize;
 }
 
-/// Half as much again, so that adding items one by one costs a constant each.
+/// Grows by half, so that appending items one by one takes constant time each.
 int grownCapacity(int capacity, int needed) {
     const int grown = capacity > INT_MAX / 3 * 2 ? INT_MAX : capacity + capacity / 2;
     return std::max({grown, needed, kSmallestCapacity});

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Trimmed surfaces: what they consist of is connected to them.
+// Trimmed surfaces: their parts are connected to them.
 #include <fbxsdk/FbxTrimNurbsSurface.h>
 
 #include "geometry/GeometrySource.h"
@@ -39,7 +39,7 @@ void FbxTrimNurbsSurface::SetNurbsSurface(const FbxNurbsSurface* pNurbs) {
         if (!DisconnectSrcObject(former))
             break;
     }
-    // A connection is made on both ends; the surface's content stays untouched.
+    // A connection changes both ends; the surface's content is unchanged.
     ConnectSrcObject(const_cast<FbxNurbsSurface*>(pNurbs));
 }
 

@@ -13,16 +13,16 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// How many polygons a list of corners is cut into.
+/// The number of polygons in a list of corners.
 int countPolygons(const PlainArray<int>& corners) {
     const auto closed = std::count_if(corners.begin(), corners.end(), [](int corner) { return corner < 0; });
     const bool lastIsOpen = corners.count() > 0 && corners[corners.count() - 1] >= 0;
     return static_cast<int>(closed) + (lastIsOpen ? 1 : 0);
 }
 
-/// Corners come as in files: a negative entry is the last corner of its polygon, all bits inverted. A last polygon that
-/// is never closed ends with the list. Corners at points that do not exist go to point 0; when there are no points,
-/// there can be no polygons. How many there were of them.
+/// Corners are as in files: a negative entry is the last corner of its polygon, all bits inverted. An unterminated last
+/// polygon ends with the list. Corners at points that do not exist are moved to point 0; without points there are no
+/// polygons. Returns the number of such corners.
 int cutIntoPolygons(PlainArray<int>& corners, PlainArray<int>& starts, int pointCount) {
     int repaired = 0;
     if (pointCount == 0) {
@@ -46,7 +46,7 @@ int cutIntoPolygons(PlainArray<int>& corners, PlainArray<int>& starts, int point
     return repaired;
 }
 
-/// Adds offsets, three numbers each, to the points that the indices name; without indices to the first points in order.
+/// Adds offsets, three numbers each, to the points of the indices; without indices to the first points in order.
 void applyOffsets(PlainArray<FbxVector4>& points, const PlainArray<int>* indices, const std::vector<double>& offsets) {
     int count = static_cast<int>(offsets.size() / 3);
     if (indices)

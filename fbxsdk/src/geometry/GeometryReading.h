@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The content of geometry and deformers from the records of a file. Numbers that do not fit together make no geometry:
+// The content of geometry and deformers from the records of a file. Inconsistent numbers give no geometry:
 // the object stays without points.
 #pragma once
 
@@ -23,19 +23,19 @@ class FbxPatch;
 
 namespace detail {
 
-/// The geometry will read itself from the object's sub-records. Costs nothing until then; keeps the document alive.
+/// The geometry will read itself from the object's sub-records. Trivial until then; shares ownership of the document.
 void attachSource(FbxGeometryBase& geometry, const std::shared_ptr<const Document>& document,
                   const DocumentObject& object);
 
-// What the classes call on the first access, without the layers. The object is empty then.
+// Called by the classes on the first access, except for the layers. The object is empty then.
 
-/// How many corners named points that there are not.
+/// How many corners refer to points that do not exist.
 int readMesh(FbxMesh& mesh, const GeometrySource& source);
-/// The base's points, moved by the offsets. Offsets for points that are not there are skipped.
+/// The base's points, moved by the offsets. Offsets for points that do not exist are skipped.
 void readShape(FbxShape& shape, const FbxGeometryBase& base, const Record& body);
 
 /// Adds the layers and elements of the record to a container without any. The elements' arrays stay in the file until
-/// somebody asks for them.
+/// they are accessed.
 void readLayers(FbxLayerContainer& container, const GeometrySource& source);
 
 /// Points beyond the last whole triple are dropped; indices of points that do not exist become the first point, and
@@ -44,8 +44,8 @@ void readLine(FbxLine& line, const Record& body);
 
 void readPatch(FbxPatch& patch, const Record& body);
 
-/// For every deformer and sub-deformer, after its properties. Clusters will read their points from the document when
-/// somebody asks for them, and keep it alive until then.
+/// For every deformer and sub-deformer, after its properties. Clusters read their points from the document on the
+/// first access, and share ownership of it until then.
 void readDeformer(FbxObject& deformer, const std::shared_ptr<const Document>& document, const DocumentObject& object);
 
 } // namespace detail

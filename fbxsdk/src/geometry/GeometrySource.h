@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Where an object's content stands as long as nobody has asked for it.
+// The source of an object's content until the first access.
 #pragma once
 
 #include <memory>
@@ -18,7 +18,7 @@ struct MeshOfSurface;
 struct GeometrySource {
     std::shared_ptr<const Document> document;
     const Record* body = nullptr;
-    std::shared_ptr<const MeshOfSurface> surface{}; ///< of a mesh that is made of one; there is no document then
+    std::shared_ptr<const MeshOfSurface> surface{}; ///< of a mesh that replaces a surface; there is no document then
 };
 
 } // namespace detail

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes and shapes: the mirror of GeometryReading.
+// Meshes and shapes: the inverse of GeometryReading.
 #include "geometry/GeometryWriting.h"
 
 #include <algorithm>
@@ -25,7 +25,7 @@ std::vector<double> packedPoints(const FbxGeometryBase& geometry) {
     return numbers;
 }
 
-/// The last corner of a polygon has all bits inverted. Corners that belong to no polygon are left out.
+/// The last corner of a polygon has all bits inverted. Corners that belong to no polygon are omitted.
 std::vector<std::int32_t> closedPolygons(const FbxMesh& mesh) {
     std::vector<std::int32_t> corners;
     corners.reserve(static_cast<std::size_t>(mesh.GetPolygonVertexCount()));
@@ -62,14 +62,14 @@ std::vector<RecordSink::Part> partsOf(FbxGeometryBase& geometry) {
             [mesh](RecordSink& sink) { writePolygons(*mesh, sink); }};
 }
 
-/// Smaller meshes are written before a thread has begun.
+/// Smaller meshes are written faster than a thread starts.
 bool isLarge(FbxGeometryBase& geometry) {
     constexpr int kFewestCorners = 1 << 16;
     const auto* mesh = FbxCast<FbxMesh>(&geometry);
     return mesh && mesh->GetPolygonVertexCount() >= kFewestCorners;
 }
 
-/// What a shape changes about its base: points that it moves, and by how much.
+/// The difference of a shape to its base: the points that it moves, and the offsets.
 struct ShapeOffsets {
     std::vector<std::int32_t> indices;
     std::vector<double> offsets;
@@ -101,7 +101,7 @@ void writeShapeRecords(FbxShape& shape, const VersionTraits& traits, RecordSink&
         writeInteger(sink, "Version", 100);
     writeArray<std::int32_t>(sink, "Indexes", shapeOffsets.indices);
     writeArray<double>(sink, "Vertices", shapeOffsets.offsets);
-    // Normals are not kept, but some readers insist on their record.
+    // Normals are not stored, but some readers require their record.
     writeArray<double>(sink, "Normals", std::vector<double>(shapeOffsets.offsets.size(), 0.0));
 }
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The records of geometry and of what deforms it.
+// The records of geometry and of deformers.
 #pragma once
 
 #include <vector>
@@ -16,22 +16,22 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Everything behind the properties of a geometry: points, polygons, layers.
+/// Everything after the properties of a geometry: points, polygons, layers.
 void writeGeometryRecords(FbxGeometryBase& geometry, const VersionTraits& traits, RecordSink& sink);
 
-/// What stands before the properties of a skin, a cluster, a blend shape, one of its channels or a cache deformer …
+/// The records before the properties of a skin, a cluster, a blend shape, one of its channels or a cache deformer …
 void writeDeformerVersion(const FbxObject& deformer, const VersionTraits& traits, RecordSink& sink);
-/// … and behind them.
+/// … and after them.
 void writeDeformerRecords(FbxObject& deformer, const VersionTraits& traits, RecordSink& sink);
 
 /// The elements and layers of a geometry. Without edges there are no elements that are mapped by them.
-/// `atOnce` lets the sink write the parts and the elements at the same time, where elements are not shared.
+/// `atOnce` allows the sink to write the parts and the elements at the same time, where elements are not shared.
 void writeWithLayers(std::vector<RecordSink::Part> parts, const FbxLayerContainer& container, bool hasEdges,
                      const VersionTraits& traits, RecordSink& sink, bool atOnce);
 
 /// NURBS surfaces and curves, trimmed surfaces, boundaries, patches and lines; nothing for other classes.
 void writeNurbsRecords(FbxGeometryBase& geometry, RecordSink& sink);
-/// What stands behind the layers of a geometry, if its class has any such records.
+/// The records after the layers of a geometry, if its class has any.
 void writeRecordsBehindLayers(const FbxGeometryBase& geometry, RecordSink& sink);
 
 } // namespace detail

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Items that are made of doubles alone are decoded in place. Points have one double more than files store: theirs are
+// Items that consist of doubles are decoded in place. Points have one double more than files store: theirs are
 // decoded into the end of the array and moved apart from the front on:
 //
 //      [ . . . x y z x y z x y z ]   ->   [ x y z 1 x y z 1 x y z 1 ]
@@ -23,11 +23,11 @@ static_assert(sizeof(FbxVector4) == 4 * sizeof(double) && sizeof(FbxVector2) == 
               sizeof(FbxColor) == 4 * sizeof(double));
 
 int itemCount(const Record& record, std::size_t numbersPerItem) {
-    constexpr std::size_t kMost = INT_MAX / 4; // so that also the numbers of all items can be counted
+    constexpr std::size_t kMost = INT_MAX / 4; // so that the total count of numbers also fits
     return static_cast<int>(std::min(record.numberCount() / numbersPerItem, kMost));
 }
 
-/// So many numbers of a record are an item.
+/// The count of numbers per item in a record.
 template <class Item>
 constexpr std::size_t kNumbersPerItem = kStoredBytes<Item> / sizeof(double);
 template <>
@@ -35,7 +35,7 @@ constexpr std::size_t kNumbersPerItem<int> = 1;
 template <>
 constexpr std::size_t kNumbersPerItem<bool> = 1;
 
-/// Item consists of doubles and nothing else.
+/// Item consists of doubles only.
 template <class Item>
 bool decodeInPlace(const Record& record, std::span<Item> items) {
     constexpr std::size_t kNumbers = sizeof(Item) / sizeof(double); // NOLINT(bugprone-sizeof-expression)
@@ -49,7 +49,7 @@ bool decode(const Record& record, std::span<FbxVector4> items) {
         return false;
     const double* from = stored.data();
     for (std::size_t i = 0; i < items.size(); ++i, from += 3) {
-        const double x = from[0], y = from[1], z = from[2]; // the last points overlap with where they go
+        const double x = from[0], y = from[1], z = from[2]; // the last points overlap with their destination
         items[i] = FbxVector4(x, y, z, 1.0);
     }
     return true;
@@ -85,10 +85,10 @@ bool decodeAll(const Record& record, PlainArray<Item>& items) {
     return keptIf(decode(record, resized(record, items, kNumbersPerItem<Item>)), items);
 }
 
-/// Smaller arrays are not worth a window to the file.
+/// Smaller arrays do not justify a window to the file.
 constexpr std::size_t kLeastStoredBytes = std::size_t{1} << 14;
 
-/// Whether the packed numbers of an array are items.
+/// Whether the packed numbers of an array have the layout of items.
 template <class Item>
 bool holdsItems(const StoredArray& array) {
     using Element = StoredArray::Element;
@@ -110,7 +110,7 @@ struct FourthNumbers {
     int count = 0;
 };
 
-/// None when all of them are 1, as nearly always: the vectors can stay in the file then.
+/// None when all of them are 1, the usual case: the vectors can stay in the file then.
 FourthNumbers unusualFourths(const Record* record) {
     const int count = record ? itemCount(*record, 1) : 0;
     if (count == 0)
@@ -140,7 +140,7 @@ public:
             return false;
         this->setBytes(storedBytes(file, *array));
         if (this->hasBytes())
-            mDocument.reset(); // the bytes need the file alone
+            mDocument.reset(); // the bytes depend only on the file
         return this->hasBytes();
     }
 
@@ -160,7 +160,7 @@ public:
 
 private:
     std::shared_ptr<const Document> mDocument;
-    const Record& mRecord; ///< of the document
+    const Record& mRecord; ///< owned by the document
     LateReading mReading;
     const Record* mFourth;
 };

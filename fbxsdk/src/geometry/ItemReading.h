@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From the number lists of records to arrays of items. Numbers are decoded into the memory where the items stay.
+// Conversion of the number lists of records to arrays of items. Numbers are decoded directly into the items' memory.
 #pragma once
 
 #include <fbxsdk/FbxColor.h>
@@ -29,14 +29,14 @@ bool readItems(const Record& record, PlainArray<bool>& items);
 
 /// How items are read on the first access.
 enum class LateReading {
-    shown, ///< items that the file has in the layout of memory, compressed or not, stay there while only values are
-           ///< asked for
+    shown, ///< items in the layout of memory, compressed or not, stay in the file while only values are
+           ///< read
     whole  ///< all items at once
 };
 
-/// The same on the first access to the array. The document keeps the record alive until then. Vectors may have their
-/// fourth numbers in a record of their own; they are 1 where there is none, and where it is corrupt: nobody needs them
-/// to use the other three.
+/// The same on the first access to the array. Shares ownership of the document until then. Vectors may have their
+/// fourth numbers in a record of their own; they are 1 where there is none, and where it is corrupt: the other three
+/// are usable without them.
 template <class Item>
 void readLate(std::shared_ptr<const Document> document, const Record& record, PlainArray<Item>& items,
               LateReading reading = LateReading::shown, const Record* fourth = nullptr);

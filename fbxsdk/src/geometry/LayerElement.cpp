@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Layer elements: their modes and arrays, and who they belong to.
+// Layer elements: their modes and arrays, and their owners.
 #include <stdexcept>
 
 #include <fbxsdk/FbxLayer.h>
@@ -11,7 +11,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
 void throwMissingDirectArray() {
-    throw std::runtime_error("FbxLayerElementArrayTemplate - mDirectArray is NULL"); // kept: hosts rely on the sentence
+    throw std::runtime_error("FbxLayerElementArrayTemplate - mDirectArray is NULL"); // kept: hosts rely on the text
 }
 
 void throwMissingIndexArray() { throw std::runtime_error("FbxLayerElementArrayTemplate - mIndexArray is NULL"); }

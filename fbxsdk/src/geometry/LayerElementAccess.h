@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// What the readers of files may do with layers and elements, and hosts may not.
 #pragma once
 
 #include <fbxsdk/FbxLayer.h>
@@ -21,6 +19,7 @@ static_assert(FbxLayerElement::eTextureDiffuse + std::size(kLayerChannels) ==
 static_assert(kMappingModes.size() == FbxLayerElement::eAllSame + 1U &&
               kReferenceModes.size() == FbxLayerElement::eIndexToDirect + 1U);
 
+/// Access to layers and elements for the readers of files, not for hosts.
 struct LayerElementAccess {
     // Slots of a layer: an element type, or the texture coordinates of a texture channel.
     [[nodiscard]] static int uvSlot(FbxLayerElement::EType channel) { return FbxLayer::uvSlot(channel); }
@@ -28,7 +27,7 @@ struct LayerElementAccess {
     /// The element's class must be that of the slot.
     static void setElement(FbxLayer& layer, int slot, FbxLayerElement& element) { layer.set(&element, slot); }
 
-    /// Makes the element a damaged one.
+    /// Leaves the element without its direct array, as damaged files do.
     template <class T>
     static void removeDirectArray(FbxLayerElementTemplate<T>& element) {
         element.mDirectArray.reset();

@@ -1,15 +1,15 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A geometry lists its elements, each with a number of its own type, and then says for each layer which of them stand
+// A geometry lists its elements, each with a number of its own type, and then for each layer the elements
 // in it:
 //
 //     LayerElementNormal: 0 { MappingInformationType, ReferenceInformationType, Normals, … }
 //     LayerElementUV: 0 { … }
 //     Layer: 0 { LayerElement: { Type: "LayerElementNormal" TypedIndex: 0 } … }
 //
-// Elements that no layer names go to the layer of their number. Elements that say nothing sound about their mapping,
-// and such without data, are left out.
+// Elements that no layer names go to the layer of their number. Elements with an invalid mapping,
+// and those without data, are omitted.
 #include "geometry/GeometryReading.h"
 
 #include <algorithm>
@@ -34,7 +34,7 @@ using Element = FbxLayerElement;
 using Access = LayerElementAccess;
 using Storage = LayerElementStorage;
 
-/// The arrays of one element; null for an array that it has not. The fourth numbers are those of vectors.
+/// The arrays of one element; null for an absent array. The fourth numbers are those of vectors.
 struct ArrayRecords {
     const std::shared_ptr<const Document>& document;
     const Record* direct;
@@ -48,7 +48,7 @@ template <class Class>
 Element* create(FbxLayerContainer& container, const char* name, const ArrayRecords& records) {
     using Item = typename Class::ArrayElementType;
     Class* element = Class::Create(&container, name);
-    // Pointers are no content of files.
+    // Pointers are not stored in files.
     if constexpr (!std::is_pointer_v<Item>) {
         if (records.direct)
             readLate(records.document, *records.direct, element->GetDirectArray().items(), LateReading::shown,
@@ -120,7 +120,7 @@ const Record* childWithNumbers(const Record& record, std::string_view name) {
     return child && child->numberCount() > 0 ? child : nullptr;
 }
 
-/// The reference mode that follows from what an element says and which arrays it has.
+/// The reference mode that follows from an element's records and arrays.
 Element::EReferenceMode referenceOf(const Record& element, Storage storage, bool hasIndices) {
     if (storage == Storage::groups)
         return Element::eIndex;
@@ -158,7 +158,7 @@ private:
         bool placed = false;
     };
 
-    /// Of several elements of one type and number the first one counts.
+    /// Of several elements of one type and number the first one is used.
     void readElement(const Record& record) {
         const std::optional<ElementKind> kind = kindOf(record.name);
         if (!kind)
@@ -202,7 +202,7 @@ private:
         }
     }
 
-    /// An element may stand in several layers; of two elements of one type in a layer the first one counts.
+    /// An element may be in several layers; of two elements of one type in a layer the first one is used.
     static void place(ReadElement& element, FbxLayer& layer) {
         if (Access::elementAt(layer, element.slot))
             return;
@@ -217,8 +217,8 @@ private:
             place(element, *mContainer.GetLayer(mContainer.CreateLayer()));
     }
 
-    /// The layer of that number, made with all before it. Null for numbers that no sound file has: a geometry has not
-    /// more layers than it names layers and elements.
+    /// The layer of that number, created with all before it. Null for numbers that no valid file has: a geometry does
+    /// not have more layers than it names layers and elements.
     FbxLayer* layerAt(std::int64_t number) {
         if (number < 0 || number >= mLayerLimit)
             return nullptr;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Layer elements and layers: the mirror of LayerReading. Elements come first, numbered within their type, then the
+// Layer elements and layers: the inverse of LayerReading. Elements come first, numbered within their type, then the
 // layers that name them.
 #include <algorithm>
 #include <map>
@@ -47,7 +47,7 @@ std::span<const int> spanOf(const FbxLayerElementArrayTemplate<int>& array) {
     return {array.GetLocked(), static_cast<std::size_t>(array.GetCount())};
 }
 
-/// The numbers of each item from the first of these components up to before the last one, packed.
+/// The numbers of each item from the first of these components to the one before the last, packed.
 template <class Item>
 std::vector<double> packed(DirectArray<Item> array, int begin, int end) {
     std::vector<double> numbers(static_cast<std::size_t>(array.GetCount()) * static_cast<std::size_t>(end - begin));
@@ -121,7 +121,7 @@ void writePolygonGroups(const ElementRecords& records) {
                                            : indicesOf<FbxLayerElementPolygonGroup>(records.element)));
 }
 
-/// One number for all when nobody gave any: the first material or texture.
+/// One number for all when none is set: the first material or texture.
 template <class Class>
 void writeNumbers(const ElementRecords& records) {
     constexpr int kFirst[] = {0};
@@ -139,7 +139,7 @@ void writeTextures(const ElementRecords& records) {
 
 using WriteElement = void (*)(const ElementRecords& records);
 
-/// What writes the arrays of each type. All texture channels have the same.
+/// The function that writes the arrays of each type. All texture channels have the same.
 struct ElementWriter {
     int type;
     WriteElement write;
@@ -191,7 +191,7 @@ std::vector<ElementKind> allKinds() {
     return kinds;
 }
 
-/// Lists of numbers are never direct in files.
+/// Files have no direct lists of numbers.
 std::string_view referenceName(const Element& element, LayerElementStorage storage) {
     switch (storage) {
     case LayerElementStorage::groups:
@@ -222,7 +222,7 @@ public:
         return list;
     }
 
-    /// Whether an element stands in two slots, so that two parts read it.
+    /// Whether an element is in two slots, so that two parts read it.
     [[nodiscard]] bool hasSharedElements() const {
         std::set<const Element*> elements;
         for (const auto& [elementAndSlot, number] : mNumbers)
@@ -231,13 +231,13 @@ public:
     }
 
 private:
-    /// Null for what cannot be written either.
+    /// Null for elements that cannot be written either.
     [[nodiscard]] const Element* elementAt(const FbxLayer& layer, int slot) const {
         const Element* element = Access::elementAt(layer, slot);
         return element && (mHasEdges || element->GetMappingMode() != Element::eByEdge) ? element : nullptr;
     }
 
-    /// An element that stands in several layers is written once.
+    /// An element in several layers is written once.
     void addElements(const ElementKind& kind, std::vector<RecordSink::Part>& list) {
         std::int32_t count = 0;
         for (int i = 0; i < mContainer.GetLayerCount(); ++i) {
@@ -261,7 +261,7 @@ private:
         try {
             writerOf(kind.row.type)({element, kind.row, mTraits, sink});
         } catch (const std::runtime_error&) {
-            // A damaged element has no array; it is written without, and read as if it were not there.
+            // A damaged element has no array; it is written without, and ignored on reading.
         }
     }
 
@@ -283,7 +283,7 @@ private:
     bool mHasEdges;
     const VersionTraits& mTraits;
     std::vector<ElementKind> mKinds;
-    std::map<std::pair<const Element*, int>, std::int32_t> mNumbers; ///< of elements within their kind
+    std::map<std::pair<const Element*, int>, std::int32_t> mNumbers; ///< index of elements within their type
 };
 
 } // namespace

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The numbers that curves and surfaces of splines have in common in files: points, counts and steps.
+// The numbers common to curves and surfaces of splines in files: points, counts and steps.
 #pragma once
 
 #include <cstdint>
@@ -14,9 +14,9 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// More points are no geometry: counts and sums of a few of them stay within an int.
+/// More points are invalid: counts and sums of a few of them fit in an int.
 inline constexpr std::int64_t kMostPoints = 1 << 29;
-/// Subdivisions of a span where a file says nothing.
+/// Subdivisions of a span where a file states none.
 inline constexpr int kUsualStep = 4;
 
 /// The value at an index, wherever the record has it: as one of its values or in its array.

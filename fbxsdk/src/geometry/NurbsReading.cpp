@@ -30,7 +30,7 @@ std::vector<Number> numbersOf(const Record& body, std::string_view name) {
     return numbers;
 }
 
-/// Old files may give each knot once, with the number of times that it counts.
+/// Old files may list each knot once, with its multiplicity.
 std::vector<double> repeatKnots(const std::vector<double>& knots, const std::vector<int>& multiplicity,
                                 std::size_t expected) {
     if (knots.size() == expected || multiplicity.size() != knots.size())
@@ -44,7 +44,7 @@ std::vector<double> repeatKnots(const std::vector<double>& knots, const std::vec
     return repeated;
 }
 
-/// What the two classes of surfaces call their records.
+/// The names of the records of the two classes of surfaces.
 struct SurfaceRecords {
     std::string_view order;
     bool hasMultiplicity;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// NURBS from the records of a file. Numbers that do not fit together (orders, counts of points and knots) make no
+// NURBS from the records of a file. Inconsistent numbers (orders, counts of points and knots) give no
 // geometry: the object keeps its defaults, without points and knots.
 #pragma once
 
@@ -18,9 +18,9 @@ class FbxTrimNurbsSurface;
 
 namespace detail {
 
-/// How many knots a direction has whose first points come again that many times behind its last one.
+/// How many knots a direction has whose first points are repeated that many times after its last one.
 [[nodiscard]] constexpr int knotCount(int points, int order, int repeated) { return points + order + repeated; }
-/// How many of a direction's first points come again behind its last one.
+/// How many of a direction's first points are repeated after its last one.
 [[nodiscard]] constexpr int repeatedPoints(FbxNurbsSurfaceBase::EType type, int order) {
     return type == FbxNurbsSurfaceBase::ePeriodic ? order - 1 : type == FbxNurbsSurfaceBase::eClosed ? 1 : 0;
 }
@@ -32,7 +32,7 @@ void readNurbs(FbxNurbs& nurbs, const Record& body);
 void readNurbsSurface(FbxNurbsSurface& surface, const Record& body);
 void readNurbsCurve(FbxNurbsCurve& curve, const Record& body);
 void readTrimNurbsSurface(FbxTrimNurbsSurface& surface, const Record& body);
-/// What a boundary consists of stands in its connections.
+/// The curves of a boundary are connected to it.
 void readBoundary(FbxBoundary& boundary, const Record& body);
 
 } // namespace detail

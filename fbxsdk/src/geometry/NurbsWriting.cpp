@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Surfaces, curves and lines: the mirror of NurbsReading, PatchReading and LineReading.
+// Surfaces, curves and lines: the inverse of NurbsReading, PatchReading and LineReading.
 #include "geometry/GeometryWriting.h"
 
 #include <span>
@@ -44,7 +44,7 @@ std::string_view formName(FbxNurbsSurfaceBase::EType type) {
     return spellingOf(kSurfaceForms, type, FbxNurbsSurfaceBase::eOpen);
 }
 
-/// What the two classes of surfaces call their records.
+/// The names of the records of the two classes of surfaces.
 struct SurfaceNames {
     std::string_view type, version, order;
 };
@@ -69,7 +69,7 @@ void writeCurve(const FbxNurbsCurve& curve, RecordSink& sink) {
     writeInteger(sink, "NurbsCurveVersion", kVersion);
     writeInteger(sink, "Order", curve.GetOrder());
     writeInteger(sink, "Dimension", curve.GetDimension());
-    // kept: the applications' files have no such record; it is written for those who ask for another step.
+    // kept: the applications' files have no such record; it is written for hosts that set another step.
     if (curve.GetStep() != kUsualStep)
         writeInteger(sink, "Step", curve.GetStep());
     writeText(sink, "Form", spellingOf(kCurveForms, curve.GetType(), FbxNurbsCurve::eOpen));

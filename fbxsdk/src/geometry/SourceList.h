@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Sources of one class that an object keeps at hand, in order of connection, so that asking for the i-th is no search.
+// An object's sources of one class, cached in order of connection, so that access by index needs no search.
 #pragma once
 
 #include <algorithm>
@@ -18,16 +18,16 @@ template <class T>
                                                                           : nullptr;
 }
 
-/// -1 when it is not there.
+/// -1 when it is not in the list.
 template <class T>
 [[nodiscard]] int indexOf(const std::vector<T*>& sources, const FbxObject* object) {
-    // What was added last is mostly asked for: search from the back.
+    // The last additions are looked up most often: search from the back.
     const auto found =
         std::find_if(sources.rbegin(), sources.rend(), [object](const T* source) { return source == object; });
     return static_cast<int>(sources.rend() - found) - 1;
 }
 
-/// To be called from connectionChanged of the destination. Returns the place where a source was removed; -1 when none
+/// To be called from connectionChanged of the destination. Returns the index of a removed source; -1 when none
 /// was.
 template <class T>
 int followConnection(std::vector<T*>& sources, FbxObject& source, bool connected) {
@@ -54,7 +54,7 @@ T* removeSource(FbxObject& destination, const std::vector<T*>& sources, T* sourc
     return source && indexOf(sources, source) >= 0 && destination.DisconnectSrcObject(source) ? source : nullptr;
 }
 
-/// Moves the object from every destination of the class to this one; null only takes it away.
+/// Moves the object from every destination of the class to this one; null only removes it.
 template <class T>
 bool moveToDestination(FbxObject& object, T* destination) {
     while (T* former = object.GetDstObject<T>()) {

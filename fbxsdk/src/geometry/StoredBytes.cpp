@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Arrays that are read, let go, and read again.
+// Arrays that are read, released, and read again.
 #include "geometry/StoredBytes.h"
 
 #include <algorithm>
@@ -16,9 +16,9 @@ namespace detail {
 
 namespace {
 
-/// Of a place in the bytes; their size for any other.
+/// The offset of a place in the bytes; their size for any other.
 std::size_t distanceInto(std::span<const char> bytes, const char* place) {
-    const std::less<const char*> before; // also for pointers that do not belong together
+    const std::less<const char*> before; // also for pointers into different objects
     const bool within = !before(place, bytes.data()) && before(place, bytes.data() + bytes.size());
     return within ? static_cast<std::size_t>(place - bytes.data()) : bytes.size();
 }
@@ -32,11 +32,11 @@ const char* FileWindow::look(std::span<const char> part) {
         mMemory = std::make_unique_for_overwrite<char[]>(part.size());
         mSize = part.size();
     }
-    // Windows overlap, since items are not quite asked for in order.
+    // Windows overlap, since items are accessed only roughly in order.
     const std::size_t kept = mLast.size() - std::min(mLast.size(), distanceInto(mLast, part.data()));
     const std::size_t size = std::min(kept, part.size());
     std::memmove(mMemory.get(), mMemory.get() + (mLast.size() - kept), size);
-    mLast = {}; // should the file fail
+    mLast = {}; // in case the file fails
     mFile->read(part.subspan(size), mMemory.get() + size);
     mLast = part;
     return mMemory.get();

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Packed items of a file, in memory as long as somebody looks at them.
 #pragma once
 
 #include <memory>
@@ -13,6 +11,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+/// Packed items of a file, in memory while they are accessed.
 class StoredBytes {
 public:
     StoredBytes() = default;
@@ -20,17 +19,17 @@ public:
     StoredBytes& operator=(const StoredBytes&) = delete;
     virtual ~StoredBytes() = default;
 
-    /// The places of all bytes. Whoever reads some asks for a look at them.
+    /// The addresses of all bytes. A caller requests a window before reading some of them.
     [[nodiscard]] virtual std::span<const char> bytes() const = 0;
-    /// Some of the bytes, until the next look. Throws FileFault.
+    /// Some of the bytes, valid until the next window. Throws FileFault.
     [[nodiscard]] virtual const char* look(std::span<const char> part) { return part.data(); }
-    /// These of the bytes need not be in memory. Before any of them is read again, restore must have been called.
+    /// Releases these bytes. Before any of them is read again, restore must be called.
     virtual void release(std::span<const char> part) = 0;
-    /// All bytes are there again.
+    /// Brings all bytes back to memory.
     virtual void restore() = 0;
 };
 
-/// An array that the file has just so. Each look reads it.
+/// An array that the file stores uncompressed in the layout of memory. Each window reads it.
 class FileWindow final : public StoredBytes {
 public:
     FileWindow(std::shared_ptr<const FileBytes> file, const StoredArray& array)
@@ -46,11 +45,11 @@ private:
     std::span<const char> mPlaces;
     std::unique_ptr<char[]> mMemory;
     std::size_t mSize = 0;
-    std::span<const char> mLast; ///< of the last look
+    std::span<const char> mLast; ///< of the last window
 };
 
-/// A compressed array. It is inflated when it is made, and a second time when it is restored; then it stays, so that
-/// nobody pays more than twice for reading again and again.
+/// A compressed array. It is inflated on construction, and a second time when it is restored; then it stays in memory,
+/// so that repeated reading inflates it at most twice.
 class InflatedBytes final : public StoredBytes {
 public:
     /// Throws std::bad_alloc when there is no memory, and FileFault when the file was changed.

@@ -8,8 +8,8 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// How many items are kept at hand while they are read in order: an eighth, of long arrays less, but enough that asking
-/// the system costs nothing beside them.
+/// How many items the window has while they are read in order: an eighth, of long arrays less, but enough that system
+/// calls take little time in comparison.
 int windowSize(int count, std::size_t itemBytes) {
     constexpr std::size_t kMostBytes = std::size_t{1} << 18;
     return std::min(count / 8 + 2, static_cast<int>(kMostBytes / itemBytes));
@@ -30,10 +30,10 @@ void StoredWindow::releaseUpTo(int end) {
     mBytes->release(mBytes->bytes().subspan(from, static_cast<std::size_t>(end) * mItemBytes - from));
 }
 
-// An index a little behind the window moves it along, so that half of it lies on either side of the index. The first
-// index starts over. With any other one there is no order, and everything stays at hand from then on.
+// An index shortly after the window moves it, so that half of it lies on either side of the index. The first
+// index starts over. With any other one the order is lost, and everything stays in memory from then on.
 //
-// The last item is in the window only when it has been asked for: then most of the others are released with it.
+// The last item is in the window only when it has been read: then most of the others are released with it.
 void StoredWindow::moveWindow(int index) {
     const int size = windowSize(mCount, mItemBytes);
     const int end = mWindowStart + mWindowSize;
@@ -47,7 +47,7 @@ void StoredWindow::moveWindow(int index) {
     const int last = mCount - 1;
     const bool ordered = start > 0 || index < size;
     const int count = !ordered || index == last ? mCount - start : std::min(size, last - start);
-    mWindowSize = 0; // should the source fail
+    mWindowSize = 0; // in case the source fails
     mWindow = mBytes->look(mBytes->bytes().subspan(static_cast<std::size_t>(start) * mItemBytes,
                                                    static_cast<std::size_t>(count) * mItemBytes));
     mWindowStart = start;

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Items that are shown as the packed bytes of a file. Whoever reads them more or less in order sees them through a
-// window that moves along, and what lies before it takes no memory any more.
+// Items that are shown as the packed bytes of a file. A caller that reads them roughly in order accesses them through a
+// sliding window, and the items before it are released.
 #pragma once
 
 #include <fbxsdk/FbxPlainArray.h>
@@ -12,7 +12,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// The window over the bytes; knows nothing of the items' type but their size.
+/// The window over the bytes; depends only on the size of the items.
 class StoredWindow : public ItemSource {
 public:
     StoredWindow(int count, std::size_t itemBytes) : mCount(count), mItemBytes(itemBytes) {}

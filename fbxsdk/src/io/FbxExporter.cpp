@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Exporters: which file, which format, which version.
+// Exporters: choice of the file, the format and the version.
 #include <fbxsdk/FbxExporter.h>
 
 #include <charconv>
@@ -35,7 +35,7 @@ FbxExporter::~FbxExporter() = default;
 
 namespace {
 
-/// The registry's number for the format asked for; -1 when there is no such writer.
+/// The registry's number for the requested format; -1 when there is no such writer.
 int writerOf(const FbxIOPluginRegistry& registry, const char* fileName, int format) {
     if (format >= 0)
         return format < registry.GetWriterFormatCount() ? format : -1;
@@ -73,7 +73,7 @@ namespace {
 
 using namespace detail;
 
-/// The moment that SOURCE_DATE_EPOCH names, so that builds can be repeated; null without it.
+/// The time in SOURCE_DATE_EPOCH, for reproducible output; null without it.
 std::optional<std::chrono::system_clock::time_point> statedMoment() {
     const char* const text = std::getenv("SOURCE_DATE_EPOCH");
     if (!text)
@@ -88,7 +88,7 @@ std::optional<std::chrono::system_clock::time_point> statedMoment() {
     return std::chrono::system_clock::time_point(std::chrono::seconds(seconds));
 }
 
-/// Files state local time; a moment that was given is stated as it was given.
+/// Files state local time; a time from SOURCE_DATE_EPOCH is stated as given.
 void setCreationTime(Document& document) {
     const auto stated = statedMoment();
     const auto moment = stated.value_or(std::chrono::system_clock::now());
@@ -110,7 +110,7 @@ std::string writeRecords(Document& document, const VersionTraits& traits, bool b
     return sink.fault();
 }
 
-/// Gives the file its name, and before that theirs to the caches that wait for it: all of them, or none.
+/// Renames the file, and before that the caches that wait for it: all of them, or none.
 bool commitWithCaches(FbxScene& scene, OutputFile& file, FbxStatus& status) {
     const std::vector<FbxCache*> caches = sourcesOf<FbxCache>(scene);
     std::vector<OutputFile*> files;
@@ -179,7 +179,7 @@ bool FbxExporter::SetFileExportVersion(FbxString pVersion, FbxSceneRenamer::ERen
 }
 
 char const* const* FbxExporter::GetCurrentWritableVersions() const {
-    // All writers write the same versions, so the answer does not depend on the format chosen.
+    // All writers write the same versions, so the result does not depend on the chosen format.
     const FbxIOPluginRegistry& registry = *GetFbxManager()->GetIOPluginRegistry();
     return registry.GetWritableVersions(registry.GetNativeWriterFormat());
 }

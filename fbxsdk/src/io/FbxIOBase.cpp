@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What importers and exporters share.
+// The common part of importers and exporters.
 #include <fbxsdk/FbxIOBase.h>
 
 #include "object/ManagerData.h"

@@ -26,7 +26,7 @@ struct Format {
 constexpr int kBinary = 0, kAscii = 1;
 constexpr Format kFormats[] = {{"FBX binary (*.fbx)", "fbx"}, {"FBX ascii (*.fbx)", "fbx"}};
 
-/// What can be written, ended by null.
+/// The writable versions, terminated by null.
 constexpr auto kVersions = [] {
     std::array<const char*, std::size(detail::kVersionTraits) + 1> names{};
     std::transform(std::begin(detail::kVersionTraits), std::end(detail::kVersionTraits), names.begin(),

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Export and import settings.
 #include <fbxsdk/FbxIOSettings.h>
 
 #include "object/ManagerData.h"

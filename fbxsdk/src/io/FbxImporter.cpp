@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Importers.
 #include <fbxsdk/FbxImporter.h>
 
 #include <fbxsdk/FbxIOPluginRegistry.h>

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Objects of a document, class by class. The class table gives the class and its properties; the rows below give what
-// a class keeps outside its properties.
+// Objects of a document, class by class. The class table gives the class and its properties; the rows below are the
+// data that a class keeps outside its properties.
 #include "io/ObjectReading.h"
 
 #include <algorithm>
@@ -50,7 +50,7 @@ void readNode(const Reading& reading) {
             static_cast<FbxNode::EShadingMode>(numberOf(kShadingModes, letter, FbxNode::eHardShading)));
 }
 
-/// A file whose class defaults and objects both leave the flag out means its rotations to be in force.
+/// In a file whose class defaults and objects both omit the flag, rotations are active.
 void readNodeProperties(const Reading& reading) {
     const bool stated = reading.source.property("RotationActive") != nullptr ||
                         std::any_of(reading.document->templates.begin(), reading.document->templates.end(),
@@ -134,7 +134,7 @@ const ClassReader kReaders[] = {
     {FbxAnimCurve::ClassId, readCurveKeys},
 };
 
-/// With the object's properties, behind those that the file lists as such.
+/// Applied with the object's properties, after those that the file lists.
 const ClassReader kPropertyReaders[] = {
     {FbxNode::ClassId, readNodeProperties},
     {FbxCamera::ClassId, readCameraProperties},
@@ -149,7 +149,7 @@ void applyReaders(std::span<const ClassReader> readers, const Reading& reading) 
     }
 }
 
-/// Properties of the objects of one document, which lists them in this order.
+/// Reads the properties of a document's objects, which have their indexes in the document.
 class DocumentProperties final : public PropertySource {
 public:
     explicit DocumentProperties(std::shared_ptr<const Document> document) : mDocument(std::move(document)) {}
@@ -179,7 +179,7 @@ private:
     }
 
     std::shared_ptr<const Document> mDocument;
-    /// What the file's class defaults change, by class; worked out with the first object.
+    /// The changes by the file's class defaults, by class; computed with the first object.
     mutable std::unordered_map<const ClassInfo*, std::vector<TemplateLine>> mTemplates;
 };
 

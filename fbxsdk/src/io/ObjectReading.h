@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// One object of a document becomes one object of a scene.
+// Converts an object of a document to an object of a scene.
 #pragma once
 
 #include <memory>
@@ -22,18 +22,18 @@ struct SchemaClass;
 /// others as dynamic ones.
 void readProperties(FbxObject& object, std::span<const DocumentProperty> properties);
 
-/// A line of a class's defaults that says something else than the class's own row.
+/// A line of a class's defaults that differs from the class's own row.
 struct TemplateLine {
     int index; ///< of the property
     const DocumentProperty* line;
 };
 
-/// Sets only properties that the class has: the defaults that a file states for a class. What it takes for the next
-/// object of the class that is as fresh as this one is added to the lines.
+/// Sets only properties that the class has: the defaults that a file states for a class. The changes needed for further
+/// new objects of the class are added to the lines.
 void readTemplate(FbxObject& object, std::span<const DocumentProperty> properties, std::vector<TemplateLine>& lines);
 void applyTemplate(FbxObject& object, std::span<const TemplateLine> lines);
 
-/// Objects of one document, one after the other. Their properties are read when they are asked for.
+/// Creates the objects of one document, one after the other. Their properties are read on first access.
 class ObjectReader {
 public:
     ObjectReader(std::shared_ptr<const Document> document, FbxScene& scene);
@@ -41,7 +41,7 @@ public:
     ObjectReader& operator=(const ObjectReader&) = delete;
     ~ObjectReader();
 
-    /// Null when the object's class is not one that the platform knows.
+    /// Null when the platform has no class for the object.
     FbxObject* read(const DocumentObject& source);
 
 private:
@@ -50,7 +50,7 @@ private:
     std::shared_ptr<const Document> mDocument;
     std::shared_ptr<const PropertySource> mProperties;
     FbxScene& mScene;
-    // Objects of one kind mostly come in a row.
+    // Objects of one kind usually come in a row.
     std::string_view mLastRecord, mLastSubClass;
     const SchemaClass* mLastSchema = nullptr;
 };

@@ -64,7 +64,7 @@ WriteRecords versionRecord(int version) {
     return [version](RecordSink& sink, const VersionTraits&) { writeInteger(sink, "Version", version); };
 }
 
-/// What the Model calls itself: the kind of its attribute.
+/// The kind that a Model states: that of its attribute.
 std::string_view kindOf(FbxNode& node) {
     const FbxNodeAttribute* attribute = node.GetNodeAttribute();
     const SchemaClass* schema = attribute ? findSchema(attribute->GetClassId()) : nullptr;
@@ -150,7 +150,7 @@ constexpr const char* kNullFlags = "Null";
 constexpr const char* kMarkerFlags = "Marker";
 constexpr const char* kSkeletonFlags = "Skeleton";
 
-/// The record says which class the material is; a name that says another would be read as another.
+/// The record states the material's class; a name that states another would be read as another.
 std::string shadingModelOf(const FbxSurfaceMaterial& material) {
     const FbxString stated = material.ShadingModel.Get();
     const char* const model = material.Is<FbxSurfacePhong>()     ? "phong"
@@ -165,7 +165,7 @@ std::string shadingModelOf(const FbxSurfaceMaterial& material) {
 void writeMaterial(const Writing& writing) {
     auto& material = writing.as<FbxSurfaceMaterial>();
     if (writing.traits.defaultsLeftOut) {
-        // What the record says need not be said again. Older files list all properties.
+        // The record's content need not be repeated. Older files list all properties.
         const std::string model = shadingModelOf(material);
         std::erase_if(writing.target.properties, [&](const DocumentProperty& property) {
             return property.name == "ShadingModel" && property.values.size() == 1 &&
@@ -287,7 +287,7 @@ void writeAnyDeformer(const Writing& writing) {
 
 using WriteFunction = void (*)(const Writing&);
 
-/// The first row counts whose class the object is.
+/// The first row whose class the object has applies.
 struct ClassWriter {
     const FbxClassId& id;
     WriteFunction write;

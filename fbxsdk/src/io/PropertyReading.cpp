@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Properties are matched by name alone: type strings vary between writers and change when a property becomes
+// Properties are matched only by name: type strings vary between writers and change when a property becomes
 // animatable.
 #include "io/ObjectReading.h"
 
@@ -59,7 +59,7 @@ void setValue(PropertyData& property, const DocumentProperty& line) {
     }
 }
 
-/// Whether the line says what the class's row says already, so that nothing needs to be stored.
+/// Whether the line equals the class's row, so that nothing needs to be stored.
 bool isDefault(const FbxObject& object, int index, const DocumentProperty& line) {
     const std::span<const PropertyRow> rows = object.data().info->rows;
     if (static_cast<std::size_t>(index) >= rows.size() || object.data().property(index))

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The mirror of PropertyReading. The flag that a property may be animated changes the spelling of its type: files call
-// what can be animated "Number" where they call what cannot "double".
+// The inverse of PropertyReading. The flag that a property may be animated changes the spelling of its type: files use
+// "Number" for animatable types where others are "double".
 #include "io/SceneWriting.h"
 
 #include <algorithm>
@@ -18,13 +18,13 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// The two type strings of what may not be animated, and the one of what may.
+/// The two type strings of a type that is not animatable, and the one of its animatable form.
 constexpr struct {
     std::string_view fixed, fixedSubType, animatable;
 } kSpellings[] = {{"double", "Number", "Number"}, {"Vector3D", "Vector", "Vector"}, {"ColorRGB", "Color", "Color"},
                   {"bool", "", "Bool"},           {"int", "Integer", "Integer"},    {"enum", "", "Enum"}};
 
-/// Spells the type as the flag wants it. Other types have one spelling for both.
+/// Spells the type according to the flag. Other types have one spelling for both.
 void spellType(DocumentProperty& property, bool animatable) {
     for (const auto& row : kSpellings) {
         if (animatable && property.typeName == row.fixed && property.subTypeName == row.fixedSubType) {
@@ -51,7 +51,7 @@ bool isAnimated(const PropertyData& property) {
     });
 }
 
-/// Whether anything in the file leads to or from the property.
+/// Whether the file has connections to or from the property.
 bool isConnected(const PropertyData& property) {
     const auto isWritten = [](const ConnectionPoint* source) {
         const FbxAnimCurveNode* node = curveNodeOf(*source);
@@ -61,7 +61,7 @@ bool isConnected(const PropertyData& property) {
            std::any_of(property.plug.sources.begin(), property.plug.sources.end(), isWritten);
 }
 
-/// Whether curves drive a property is seen from its connections, not from what a file once said.
+/// Whether curves drive a property is determined by its connections, not by the flags of a file.
 unsigned flagsWith(unsigned flags, bool animated) {
     constexpr unsigned kAnimated = FbxPropertyFlags::eAnimatable | FbxPropertyFlags::eAnimated;
     return animated ? flags | kAnimated : flags & ~static_cast<unsigned>(FbxPropertyFlags::eAnimated);

@@ -24,7 +24,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// The scene's objects by their place in Document::objects; null where the platform has no such class.
+/// The scene's objects by their index in Document::objects; null where the platform has no such class.
 using ObjectTable = std::vector<FbxObject*>;
 
 void readLightSettings(const DocumentLightSettings& source, FbxGlobalLightSettings& settings) {
@@ -83,7 +83,7 @@ private:
             mScene.GetRootNode()->AddChild(node);
     }
 
-    /// A curve goes to a channel of its curve node: "d|X", or without a name the only one.
+    /// A curve is connected to a channel of its curve node: "d|X", or without a name the only one.
     static bool connectCurve(FbxObject& source, FbxObject& destination, const DocumentConnection& connection) {
         auto* curve = FbxCast<FbxAnimCurve>(&source);
         auto* node = FbxCast<FbxAnimCurveNode>(&destination);
@@ -95,7 +95,7 @@ private:
         if (channel.empty()) {
             node->ConnectToChannel(curve, 0U);
         } else {
-            node->addChannel(channel.c_str(), 0.0); // no effect when it is there
+            node->addChannel(channel.c_str(), 0.0); // no effect when it exists
             node->ConnectToChannel(curve, channel.c_str());
         }
         return true;
@@ -127,7 +127,7 @@ private:
     FbxScene& mScene;
 };
 
-/// Files name the channels of a vector in any order and leave some out; the platform counts on all of them in order.
+/// Files name the channels of a vector in any order and omit some; the platform requires all of them in order.
 void arrangeChannels(const ObjectTable& objects) {
     for (FbxObject* object : objects) {
         auto* node = FbxCast<FbxAnimCurveNode>(object);
@@ -149,7 +149,7 @@ void arrangeChannels(const ObjectTable& objects) {
     }
 }
 
-/// Camera nodes that hang nowhere and bear a producer camera's name belong to the settings.
+/// Unparented camera nodes with the name of a producer camera belong to the settings.
 void readProducerCameras(FbxScene& scene) {
     for (FbxNode* node : sourcesOf<FbxNode>(scene)) {
         if (node->GetParent() || node == scene.GetRootNode())

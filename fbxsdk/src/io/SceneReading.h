@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A document becomes a scene.
+// Converts a document to a scene.
 #pragma once
 
 #include <memory>
@@ -18,10 +18,10 @@ class FbxScene;
 
 namespace detail {
 
-/// Adds everything the document holds to the scene. The scene keeps the document alive: geometry is read from it on
-/// first use.
+/// Adds everything the document holds to the scene. The scene shares ownership of the document: geometry is read from
+/// it on first use.
 ///
-/// What had to be worked out because the file does not state it goes to `notes`, a sentence each.
+/// What was derived because the file does not state it is added to `notes`, one sentence each.
 bool readScene(const std::shared_ptr<const Document>& document, FbxScene& scene, FbxStatus& status,
                std::vector<std::string>* notes = nullptr);
 

@@ -42,7 +42,7 @@ struct ChosenObject {
     const SchemaClass* schema;
 };
 
-/// Which of the scene's objects a file holds.
+/// The scene's objects that a file holds.
 class ObjectChoice {
 public:
     ObjectChoice(FbxScene& scene, const VersionTraits& traits) : mScene(scene) {
@@ -71,12 +71,12 @@ private:
             return false;
         if (const auto* node = FbxCast<FbxAnimCurveNode>(&object))
             return !isIdle(*node);
-        // A component without keys is the value of its curve node and nothing else.
+        // A component without keys is only the value of its curve node.
         const auto* curve = FbxCast<FbxAnimCurve>(&object);
         return !curve || curve->KeyGetCount() > 0;
     }
 
-    /// Files from 7.0 on have no place for the application's views.
+    /// Files from 7.0 on cannot hold the application's views.
     void excludeViews() {
         for (const FbxNodeAttribute* attribute : sourcesOf<FbxNodeAttribute>(mScene)) {
             if (!isView(*attribute))
@@ -91,7 +91,7 @@ private:
     std::unordered_set<const FbxObject*> mExcluded;
 };
 
-/// Connections between objects of the file. What order files keep among them matters to nobody but human readers; the
+/// Connections between objects of the file. Their order in the file matters to human readers only; the
 /// order among the sources of one object does.
 class ConnectionWriter {
 public:
@@ -116,7 +116,7 @@ public:
 private:
     enum Rank { kHierarchy, kLayers, kLayerMembers, kOthers, kCurves };
 
-    /// 0 for what is not in the file.
+    /// 0 for objects that are not in the file.
     [[nodiscard]] std::int64_t idOf(const FbxObject& object) const {
         const auto found = mIds.find(&object);
         return found == mIds.end() ? 0 : found->second;

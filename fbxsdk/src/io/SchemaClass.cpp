@@ -79,7 +79,7 @@ constinit const SchemaClass kClasses[] = {
 std::span<const SchemaClass> schemaClasses() { return kClasses; }
 
 const SchemaClass* findSchema(std::string_view record, std::string_view subClass) {
-    // A row for any sub-class stands after those of its record that name one.
+    // A row for any sub-class follows those of its record that name one.
     for (const SchemaClass& row : kClasses) {
         if (row.record == record && (row.subClass == subClass || row.subClass == kAny))
             return &row;

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A selection reads the list once, and what is appended later when it is asked again; what is taken out of the middle
-// ends all selections. The gaps that removals leave in a long list are closed when somebody looks at it.
+// A selection reads the list once, and later additions when it is used again; a removal from the middle
+// discards all selections. The gaps that removals leave in a long list are closed on the next access.
 #include "object/ConnectionList.h"
 
 #include <algorithm>
@@ -15,12 +15,12 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// A list of so many connections is searched; longer ones keep selections.
+/// A list of up to this many connections is searched; longer ones keep selections.
 constexpr std::size_t kSearched = 16;
-/// So near to either end of a list a connection is searched before all places are noted.
+/// A connection this close to either end of a list is searched before all positions are indexed.
 constexpr std::size_t kNear = 32;
 
-/// Properties for no criteria.
+/// Properties for null criteria.
 bool isSelected(const ConnectionPoint& point, const FbxCriteria* criteria) {
     if (!criteria)
         return point.property >= 0;
@@ -32,7 +32,7 @@ bool isSelected(const ConnectionPoint& point, const FbxCriteria* criteria) {
 struct ConnectionList::Selection {
     bool ofProperties;
     FbxCriteria criteria;
-    std::size_t seen = 0; ///< so many of the list's connections
+    std::size_t seen = 0; ///< the number of the list's connections that are covered
     std::vector<ConnectionPoint*> found;
 
     [[nodiscard]] const FbxCriteria* condition() const { return ofProperties ? nullptr : &criteria; }
@@ -43,7 +43,7 @@ struct ConnectionList::Selection {
 
 struct ConnectionList::Removal {
     using Places = std::unordered_map<const ConnectionPoint*, std::size_t>;
-    Places places; ///< of those that are there
+    Places places; ///< of the existing ones
 };
 
 ConnectionList::ConnectionList() = default;
@@ -100,7 +100,7 @@ std::size_t ConnectionList::placeOf(const ConnectionPoint& point) {
     return found == mRemoval->places.end() ? count : found->second;
 }
 
-/// False when there is no memory for it: what is to be taken out goes all the same.
+/// False when memory runs out: the list then works without the index.
 bool ConnectionList::beginRemoval() {
     try {
         mRemoval = std::make_unique<Removal>();
@@ -116,7 +116,7 @@ bool ConnectionList::beginRemoval() {
 void ConnectionList::endRemoval() const {
     std::erase(mPoints, nullptr);
     mRemoval.reset();
-    mSelections.reset(); // they counted the gaps
+    mSelections.reset(); // their positions included the gaps
 }
 
 ConnectionList::Selection* ConnectionList::selectionOf(const FbxCriteria* criteria) const {

@@ -15,9 +15,9 @@ namespace detail {
 
 struct ConnectionPoint;
 
-/// Hosts count the objects of a class and ask for them one by one, among thousands of others. So that each answer costs
-/// a few steps, a long list keeps those of the class apart from the first question on. Belongs to one thread at a time,
-/// for questions too.
+/// Hosts count the objects of a class and get them one by one, among thousands of others. So that each call takes
+/// a few steps, a long list indexes those of the class from the first query on. Belongs to one thread at a time,
+/// also for queries.
 class ConnectionList {
 public:
     ConnectionList();
@@ -37,7 +37,7 @@ public:
     [[nodiscard]] bool contains(const ConnectionPoint& point) const;
 
     void append(ConnectionPoint& point);
-    /// False when it is not there.
+    /// False when it is not in the list.
     bool remove(const ConnectionPoint& point);
 
     // Objects that meet the criteria, in order; null out of range.
@@ -51,21 +51,21 @@ private:
     struct Selection;
     struct Removal;
 
-    // No criteria: the properties.
+    // Null criteria: the properties.
     [[nodiscard]] Selection* selectionOf(const FbxCriteria* criteria) const;
     [[nodiscard]] int count(const FbxCriteria* criteria) const;
     [[nodiscard]] ConnectionPoint* at(const FbxCriteria* criteria, int index) const;
 
-    /// Their number for what is not there.
+    /// Returned for a connection that is not in the list.
     [[nodiscard]] std::size_t placeOf(const ConnectionPoint& point);
     bool beginRemoval();
     void endRemoval() const;
 
-    /// With gaps during a removal.
+    /// Has gaps during a removal.
     mutable std::vector<ConnectionPoint*> mPoints;
-    /// While one after the other is taken out of a long list, and nobody looks.
+    /// Active while several are removed from a long list without an access in between.
     mutable std::unique_ptr<Removal> mRemoval;
-    /// What was asked for; they follow the list when they are asked again.
+    /// The queried selections; they are updated when they are queried again.
     mutable std::unique_ptr<std::vector<Selection>> mSelections;
 };
 

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Class identities.
 #include <fbxsdk/FbxClassId.h>
 
 #include "object/ObjectData.h"

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Collections.
 #include <fbxsdk/FbxCollection.h>
 
 #include "object/ManagerData.h"

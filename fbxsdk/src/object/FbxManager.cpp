@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Managers and the life of objects.
+// Managers and the lifetime of objects.
 #include <fbxsdk/FbxManager.h>
 
 #include "object/ManagerData.h"

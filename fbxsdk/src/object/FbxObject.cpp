@@ -37,7 +37,7 @@ FbxObject::~FbxObject() { mData->manager->data().leave(*this); }
 
 namespace {
 
-/// What every scene has goes with the scene only.
+/// The permanent members of a scene are freed with the scene only.
 bool isKeptByScene(const FbxObject& object) {
     return object.GetScene() && !detail::isScene(object) && object.data().membership->isFixed(object);
 }
@@ -46,7 +46,7 @@ bool isKeptByScene(const FbxObject& object) {
 
 void FbxObject::Destroy(bool pRecursive) {
     if (!pRecursive && !detail::isScene(*this)) {
-        // Takes nothing along, and no memory: whoever is done with an object can rely on it.
+        // Frees no other object and allocates no memory: callers can rely on it for cleaning up.
         FbxObject* const alone = this;
         if (!isKeptByScene(*this))
             detail::ManagerData::destroyTogether({&alone, 1});
@@ -61,7 +61,7 @@ void FbxObject::Destroy(bool pRecursive) {
     };
     doom(*this);
     for (std::size_t i = 0; i < doomed.size(); ++i) { // NOLINT(modernize-loop-convert): the list grows
-        // A scene takes its members along, and its members are its sources.
+        // A scene frees its members as well, and its members are its sources.
         const FbxScene* scene = detail::isScene(*doomed[i]) ? doomed[i]->GetScene() : nullptr;
         for (const detail::ConnectionPoint* source : doomed[i]->mData->plug.sources) {
             if (source->property < 0 && (pRecursive || (scene && source->object->GetScene() == scene)))

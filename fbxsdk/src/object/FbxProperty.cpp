@@ -33,7 +33,7 @@ const PropertyRow* rowOf(const FbxProperty& property) {
 
 bool exists(const FbxProperty& property) { return property.IsValid() && property.index() >= 0; }
 
-/// The properties of a compound stand beside it, as "Compound|Child".
+/// The properties of a compound are stored next to it, as "Compound|Child".
 std::string_view fullName(const FbxProperty& property) {
     if (!exists(property))
         return {};
@@ -43,8 +43,8 @@ std::string_view fullName(const FbxProperty& property) {
     return data ? std::string_view(data->name) : std::string_view();
 }
 
-/// The compound that the property belongs to: of the parts of its name before a bar the longest that names a property.
-/// Invalid when there is none; a bar in the name is then nothing but a character.
+/// The compound that the property belongs to: the longest part of its name before a bar that is the name of a property.
+/// Invalid when there is none; a bar in the name is then an ordinary character.
 FbxProperty compoundOf(const FbxProperty& property) {
     std::string_view name = fullName(property);
     for (std::size_t bar = name.rfind('|'); bar != std::string_view::npos; bar = name.rfind('|')) {

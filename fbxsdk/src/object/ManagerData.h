@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The manager's list of objects, and the one place where objects are made and freed.
 #pragma once
 
 #include <cstdint>
@@ -20,6 +18,7 @@ namespace detail {
 
 class EvaluationBudget;
 
+/// The manager's list of objects, and the only functions that create and free objects.
 class ManagerData {
 public:
     template <class T>
@@ -39,9 +38,9 @@ public:
     static FbxObject* createObject(FbxManager* manager, const FbxClassId& id, const char* name);
     /// The same, connected as a source of the container.
     static FbxObject* createObject(FbxObject* container, const FbxClassId& id, const char* name);
-    /// Cuts what connects the objects with others and frees them. What connects them with each other needs no cutting.
+    /// Disconnects the objects from others and frees them. Connections between them are not removed one by one.
     static void destroyTogether(std::span<FbxObject* const> objects);
-    /// Frees everything at once, without cutting connections one by one.
+    /// Frees everything at once, without removing connections one by one.
     void destroyAll();
 
     void enter(FbxObject& object);
@@ -51,9 +50,9 @@ public:
     Slab<PropertyData> properties; ///< of all objects
     bool tearingDown = false;
     FbxIOSettings* settings = nullptr; ///< an object, which may be freed first
-    /// Grows with every change of a value, a key or a connection; evaluation caches compare it.
+    /// Incremented with every change of a value, a key or a connection; evaluation caches compare it.
     std::uint64_t revision = 0;
-    // What higher rooms keep per manager; they make it when they first ask for it.
+    // Data that higher modules keep per manager, created on first use.
     std::shared_ptr<EvaluationBudget> evaluationBudget;
     std::shared_ptr<FbxIOPluginRegistry> registry;
 };

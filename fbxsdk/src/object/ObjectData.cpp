@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What stands behind objects: property slots, connections, and how membership in a scene spreads.
+// The data of objects: property slots, connections, and how membership in a scene propagates.
 #include "object/ObjectData.h"
 
 #include <algorithm>
@@ -24,7 +24,7 @@ void noteChange(const FbxObject& object) { ++object.GetFbxManager()->data().revi
 
 static_assert(kCameraStereoRows.size() <= NameIndex::kMostRows, "no class has more");
 
-/// So many dynamic properties are searched one by one; more get an index.
+/// Up to this many dynamic properties are searched one by one; more get an index.
 constexpr std::size_t kUnindexedProperties = 32;
 
 void assignDefault(PropertyValue& value, const PropertyRow& row) {
@@ -34,7 +34,7 @@ void assignDefault(PropertyValue& value, const PropertyRow& row) {
         value.text = row.text;
 }
 
-/// For one more, so that what is made for it is never lost.
+/// Reserves memory for one more element, so that appending it cannot fail.
 void makeRoom(std::vector<PropertyData*>& list) {
     constexpr std::size_t kFirst = 8;
     if (list.size() == list.capacity())
@@ -72,7 +72,7 @@ void ObjectData::readPropertiesLater(std::shared_ptr<const PropertySource> sourc
 void ObjectData::readFromSource() {
     std::uint64_t& revision = manager->data().revision;
     const std::uint64_t before = revision;
-    const std::shared_ptr<const PropertySource> source = std::move(mUnread); // it asks for properties itself
+    const std::shared_ptr<const PropertySource> source = std::move(mUnread); // it accesses properties itself
     try {
         source->read(*plug.object, mUnreadPlace);
     } catch (...) {
@@ -81,7 +81,7 @@ void ObjectData::readFromSource() {
         revision = before;
         throw;
     }
-    revision = before; // every answer is what it would have been before
+    revision = before; // no value has changed
 }
 
 void ObjectData::dropProperties() noexcept {
@@ -122,7 +122,7 @@ int ObjectData::findPropertyInAnyCase(std::string_view propertyName) const {
 
 ObjectData::PropertyPlace ObjectData::placeOf(int index) const {
     readUnread();
-    // Files state properties in the order of their rows: most are made behind all others.
+    // Files list properties in the order of their rows: most are appended.
     if (mProperties.empty() || mProperties.back()->index < index)
         return mProperties.end();
     return std::lower_bound(mProperties.begin(), mProperties.end(), index,
@@ -194,7 +194,7 @@ PropertyValue defaultValue(const PropertyRow& row) {
 unsigned defaultFlags(const PropertyRow& row) { return FbxPropertyFlags::eStatic | propertyFlags(row.flags); }
 
 bool isConnected(const ConnectionPoint& source, const ConnectionPoint& destination) {
-    // Either list tells; the shorter one is quicker, and the list of a scene's members is long.
+    // Either list has it; the shorter one is faster, and the list of a scene's members is long.
     const bool byEnds = source.destinations.size() <= destination.sources.size();
     return byEnds ? source.destinations.contains(destination) : destination.sources.contains(source);
 }
@@ -212,7 +212,7 @@ void joinSceneOf(const FbxObject& member, FbxObject& object) {
     while (!pending.empty()) {
         FbxObject* each = pending.back();
         pending.pop_back();
-        // A scene is a member of itself alone.
+        // A scene is a member of itself only.
         if (each->GetScene())
             continue;
         each->data().scene = scene;
@@ -223,7 +223,7 @@ void joinSceneOf(const FbxObject& member, FbxObject& object) {
             ObjectData::announce(*each, membership.scene, true);
         }
         each->data().announceScene(scene);
-        // What feeds a member is a member. Pushed in reverse, so that the first source enters first.
+        // The sources of a member are members. Pushed in reverse, so that the first source enters first.
         const auto pushSources = [&](const ConnectionPoint& point) {
             const auto& sources = point.sources.all();
             for (auto source = sources.rbegin(); source != sources.rend(); ++source)
@@ -257,7 +257,7 @@ bool ObjectData::connect(ConnectionPoint& source, ConnectionPoint& destination) 
     FbxObject& to = *destination.object;
     if (&source == &destination || isConnected(source, destination))
         return false;
-    // Managers share nothing: one may be gone before the other.
+    // Managers share nothing: one may be destroyed before the other.
     if (from.GetFbxManager() != to.GetFbxManager())
         return false;
     link(source, destination);
@@ -291,7 +291,7 @@ bool ObjectData::disconnect(ConnectionPoint& source, ConnectionPoint& destinatio
 
 void ObjectData::disconnectFromSurvivors() {
     const auto cut = [](ConnectionPoint& point) {
-        // In reverse order of connection, over copies: cutting changes the lists.
+        // In reverse order of connection, over copies: disconnecting changes the lists.
         const auto sources = point.sources.all();
         for (auto each = sources.rbegin(); each != sources.rend(); ++each) {
             if (!(*each)->object->data().doomed)

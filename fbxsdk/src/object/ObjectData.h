@@ -1,12 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// What stands behind an object: its class, its name, its properties and its connections.
-//
-// A property of a class costs nothing until it is changed or connected: the class's row gives its type and default, and
-// a PropertyData is made on the first write. Those of an object from a file are read at the first question about any of
-// them. Properties are addressed by index: the rows of the class first, in their order, then the dynamic ones in order
-// of creation.
 #pragma once
 
 #include <array>
@@ -32,12 +25,12 @@ struct ClassInfo {
     const char* name; ///< "FbxNode"
     const ClassInfo* parent;
     std::span<const PropertyRow> rows;
-    /// Makes an object of the class; null for abstract classes.
+    /// Creates an object of the class; null for abstract classes.
     FbxObject* (*construct)(FbxManager& manager, const ClassInfo& info) = nullptr;
-    /// Made at the first question, and kept for good.
+    /// Created on the first look-up.
     mutable std::atomic<const NameIndex*> index = nullptr;
 
-    /// The place of the row of that name; -1 when there is none.
+    /// The index of the row of that name; -1 when there is none.
     [[nodiscard]] int findRow(const NameKey& rowName) const;
 };
 
@@ -66,27 +59,27 @@ struct PropertyData {
     const PropertyRow* row = nullptr; ///< null for dynamic ones
 };
 
-/// The properties of objects that were not read yet.
+/// A file's properties of objects, for reading them later.
 class PropertySource {
 public:
-    /// Sets the properties of the object that has the place in the source.
+    /// Sets the properties of the object, which has that index in the source.
     virtual void read(FbxObject& object, std::size_t place) const = 0;
 
 protected:
     ~PropertySource() = default;
 };
 
-/// What a scene does for its members.
+/// Interface of a scene to its members.
 class Membership {
 public:
     explicit Membership(FbxObject& owner) : scene(owner) {}
     Membership(const Membership&) = delete;
     Membership& operator=(const Membership&) = delete;
 
-    /// Keeps the scene's lists in step when an object becomes a member or stops being one.
+    /// Updates the scene's lists when an object becomes a member or stops being one.
     virtual void enter(FbxObject& member) = 0;
     virtual void leave(FbxObject& member) = 0;
-    /// Whether the object is one that every scene has: it stays as long as the scene.
+    /// Whether the object is a permanent member: it exists as long as the scene.
     [[nodiscard]] virtual bool isFixed(const FbxObject& member) const = 0;
 
     FbxObject& scene;
@@ -95,6 +88,12 @@ protected:
     ~Membership() = default;
 };
 
+/// The data of an object: its class, its name, its properties and its connections.
+///
+/// A property of a class takes no memory until it is changed or connected: the class's row gives its type and
+/// default, and a PropertyData is created on the first write. The properties of an object from a file are read on the
+/// first access to any of them. Properties are addressed by index: the rows of the class first, in their order, then
+/// the dynamic ones in order of creation.
 struct ObjectData {
     ObjectData() = default;
     ObjectData(const ObjectData&) = delete;
@@ -107,19 +106,19 @@ struct ObjectData {
     Membership* membership = nullptr; ///< of the same scene
     std::string name;
     ConnectionPoint plug;
-    std::size_t managerSlot = 0; ///< place in the manager's list
+    std::size_t managerSlot = 0; ///< position in the manager's list
     std::int64_t fileId = 0;     ///< id in the file it was read from; 0 if none
     bool doomed = false;         ///< about to be freed together with others
 
-    /// The properties are those of the source, which is asked for them once. If that fails they stay unread.
+    /// The source sets the properties, once, on the first access. If that fails they stay unread.
     void readPropertiesLater(std::shared_ptr<const PropertySource> source, std::size_t place);
 
     /// Index by name over the rows of the class and the dynamic properties; -1 when there is none.
     [[nodiscard]] int findProperty(const NameKey& propertyName) const;
     [[nodiscard]] int findPropertyInAnyCase(std::string_view propertyName) const;
-    /// The data behind an index; null while the property is as its row says.
+    /// The data of an index; null while the property equals its row.
     [[nodiscard]] PropertyData* property(int index) const;
-    /// The same, made from the row on first use.
+    /// The same, created from the row on the first write.
     PropertyData& materialise(int index);
     /// Those that have data, sorted by index.
     [[nodiscard]] const std::vector<PropertyData*>& properties() const {
@@ -127,16 +126,16 @@ struct ObjectData {
         return mProperties;
     }
     [[nodiscard]] int propertyCount() const;
-    /// A new dynamic property, behind all others.
+    /// A new dynamic property, after all others.
     PropertyData& appendProperty(const FbxDataType& type, std::string propertyName);
 
-    /// Connects two ends, spreads membership and tells both objects. False when they are connected already, when an
-    /// object would be its own source, when the ends belong to two managers, and when an object will not have it.
+    /// Connects two ends, propagates membership and notifies both objects. False when they are connected already, when
+    /// an object would be its own source, when the ends belong to two managers, and when an object refuses.
     static bool connect(ConnectionPoint& source, ConnectionPoint& destination);
     static bool disconnect(ConnectionPoint& source, ConnectionPoint& destination);
-    /// The bare connection, without telling anybody.
+    /// The connection only, without notification.
     static void link(ConnectionPoint& source, ConnectionPoint& destination);
-    /// Tells both objects of a connection between them that was made or cut.
+    /// Notifies both objects of a connection between them that was added or removed.
     static void announce(FbxObject& source, FbxObject& destination, bool connected);
     void announceScene(FbxScene* joined);
     /// Calls with each end that may have connections: those of the properties, then the object's own.
@@ -170,16 +169,16 @@ private:
     std::unique_ptr<std::unordered_map<std::string_view, int>> mDynamicIndex;
 };
 
-/// Stands for "no property in particular": the parent of all properties of an object.
+/// Represents the root property: the parent of all properties of an object.
 inline constexpr int kRootProperty = -1;
 
 [[nodiscard]] PropertyValue defaultValue(const PropertyRow& row);
 [[nodiscard]] unsigned defaultFlags(const PropertyRow& row);
 [[nodiscard]] bool isConnected(const ConnectionPoint& source, const ConnectionPoint& destination);
 [[nodiscard]] bool isScene(const FbxObject& object);
-/// Makes the object, and everything that feeds it, a member of the member's scene; those in a scene already stay there.
+/// Makes the object, and all of its sources, a member of the member's scene; those in a scene already stay there.
 void joinSceneOf(const FbxObject& member, FbxObject& object);
-/// Ends the object's membership. What feeds it stays: it is a source of the scene in its own right.
+/// Ends the object's membership. Its sources stay: they are sources of the scene in their own right.
 void leaveScene(FbxObject& object);
 
 /// A typed member of a class, bound to the row of that name.

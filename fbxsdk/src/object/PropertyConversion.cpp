@@ -1,11 +1,11 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Conversions between what a property holds and what a caller uses.
+// Conversions between a property's value and a caller's variable.
 //
-//   numbers among each other   by value: reals are truncated toward zero, what is too far becomes the nearest number of
-//                              the type, NaN becomes 0; as bool everything but 0 and NaN is true
-//   vectors and numbers        by components: a number is the first one; what one side lacks stays as it is
+//   numbers among each other   by value: reals are truncated toward zero, values out of range become the end of the
+//                              range, NaN becomes 0; as bool everything but 0 and NaN is true
+//   vectors and numbers        by components: a number is the first one; missing components stay unchanged
 //   times                      with whole numbers, as ticks
 //   text                       with text only
 #include "object/PropertyConversion.h"
@@ -68,7 +68,7 @@ Family familyOf(EFbxType type) {
     return Family::none; // a number that is no type
 }
 
-/// Calls with a value of the C++ type that stands behind a type of whole numbers.
+/// Calls with a value of the C++ type of a type of whole numbers.
 template <class Use>
 void withWholeType(EFbxType type, const Use& use) {
     switch (type) {
@@ -178,7 +178,7 @@ bool storeNumbers(const double* numbers, std::size_t count, void* target, EFbxTy
     }
 }
 
-/// A property of single precision keeps no more of a number than that.
+/// A property of single precision keeps no more precision than that.
 double keptReal(double number, EFbxType type) {
     return type == eFbxFloat || type == eFbxHalfFloat ? double{static_cast<float>(number)} : number;
 }

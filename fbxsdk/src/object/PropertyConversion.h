@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Values of properties in and out of the C++ types that callers use.
+// Conversion of property values to and from the C++ types that callers use.
 #pragma once
 
 #include <array>
@@ -17,7 +17,7 @@ namespace detail {
 bool convertNumbers(const std::array<double, 4>& numbers, void* target, EFbxType type);
 /// A property's value in a caller's variable. False, and the variable untouched, when no conversion exists.
 bool readPropertyValue(const PropertyValue& value, EFbxType from, void* target, EFbxType type);
-/// Whether a property of the type can take a caller's variable of the other one.
+/// Whether a caller's variable of the type `type` can be stored in a property of the type `to`.
 [[nodiscard]] bool isWritable(EFbxType to, EFbxType type);
 /// The other way round: a caller's variable becomes the property's value.
 bool writePropertyValue(PropertyValue& value, EFbxType to, const void* source, EFbxType type);

@@ -14,8 +14,8 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Makes and frees values of one type; their memory comes in blocks and goes back with the slab. Belongs to one thread
-/// at a time. Under the address sanitizer each value has memory of its own.
+/// Creates and destroys values of one type. Their memory is allocated in blocks, reused, and released with the slab.
+/// For one thread at a time. With the address sanitizer each value is an allocation of its own.
 template <class T>
 class Slab {
 public:

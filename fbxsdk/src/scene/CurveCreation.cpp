@@ -12,7 +12,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace {
 
-/// The channels of a property: as many as it holds numbers, up to four; none for text and references.
+/// The channels of a property: one per number, up to four; none for text and references.
 int channelCount(EFbxType type) {
     switch (type) {
     case eFbxUndefined:
@@ -30,7 +30,7 @@ int channelCount(EFbxType type) {
     }
 }
 
-/// Files call the curve nodes of the three transform properties by a letter.
+/// Files name the curve nodes of the three transform properties by a letter.
 const char* curveNodeName(const char* propertyName) {
     constexpr struct {
         std::string_view property;
@@ -71,7 +71,7 @@ FbxAnimCurveNode* FbxAnimCurveNode::CreateTypedCurveNode(FbxProperty& pProperty,
 FbxAnimCurveNode* FbxAnimLayer::CreateCurveNode(FbxProperty& pProperty) {
     if (FbxAnimCurveNode* existing = pProperty.GetCurveNode(this, false))
         return existing;
-    // Whatever the flags say: hosts key the film and the planes of cameras, which are not marked as animatable.
+    // Regardless of the flags: hosts key the film and the planes of cameras, which are not marked as animatable.
     FbxAnimCurveNode* node = FbxAnimCurveNode::CreateTypedCurveNode(pProperty, GetScene());
     if (!node)
         return nullptr;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Cameras. The lens arithmetic is the only thing that reads more than one property.
+// Cameras. Only the lens arithmetic reads more than one property.
 #include <fbxsdk/FbxCamera.h>
 
 #include <algorithm>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The default camera, and the viewing cameras that files before 7.x carry beside the node tree.
+// The default camera, and the viewing cameras that files before 7.x hold outside of the node tree.
 #include <fbxsdk/FbxGlobalCameraSettings.h>
 
 #include <algorithm>
@@ -23,7 +23,7 @@ namespace {
 using Place = detail::ProducerCamera::Place;
 constexpr const char* nameOf(Place place) { return detail::kProducerCameraNames[place]; }
 
-/// The viewing cameras of the application that the format comes from; figures of the files it writes.
+/// The viewing cameras of the application that the format comes from, with the values in its files.
 struct ProducerRow {
     const char* name;
     double position[3];
@@ -41,7 +41,7 @@ constexpr ProducerRow kProducerCameras[] = {
     {nameOf(Place::left), {-4000, 0, 0}, {0, 1, 0}, FbxCamera::eOrthogonal, 1, 30000},
 };
 constexpr double kProducerFieldOfView = 40.0;
-constexpr double kProducerFocalLength = 21.354493494969105; // what 40° are over a film height of 0.612 inch
+constexpr double kProducerFocalLength = 21.354493494969105; // the focal length of 40° over a film height of 0.612 inch
 
 FbxNode* makeNode(FbxScene& scene, const char* name, FbxNodeAttribute& attribute) {
     FbxNode* node = FbxNode::Create(&scene, name);
@@ -71,7 +71,7 @@ bool isFixedName(const char* name) {
                        [&](const ProducerRow& row) { return std::strcmp(row.name, name) == 0; });
 }
 
-/// Several nodes may bear the name; one of them being a camera is enough.
+/// Several nodes may have the name; one of them being a camera is enough.
 bool hasCamera(FbxNode& root, const char* name) {
     detail::NodesBelow<FbxNode> below(root);
     while (FbxNode* node = below.next()) {

@@ -59,7 +59,7 @@ int indexIn(const std::vector<T*>& objects, const T* object) {
     return found == objects.end() ? -1 : static_cast<int>(found - objects.begin());
 }
 
-/// Removes the object. Connections are mostly cut in reverse order, so the search starts at the end.
+/// Removes the object. Connections are mostly removed in reverse order, so the search starts at the end.
 template <class T>
 void takeOut(std::vector<T*>& objects, const T* object) {
     const auto found = std::find(objects.rbegin(), objects.rend(), object);

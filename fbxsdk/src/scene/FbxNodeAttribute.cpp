@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Node attributes, and the list of the nodes that carry each.
+// Node attributes, and the list of each attribute's nodes.
 #include <fbxsdk/FbxNodeAttribute.h>
 
 #include <algorithm>
@@ -40,7 +40,7 @@ void FbxNodeAttribute::connectionChanged(FbxObject& pSource, FbxObject& pDestina
         mNodes.push_back(node);
         return;
     }
-    // Connections are mostly cut in reverse order.
+    // Connections are mostly removed in reverse order.
     const auto found = std::find(mNodes.rbegin(), mNodes.rend(), node);
     if (found != mNodes.rend())
         mNodes.erase(std::next(found).base());

@@ -92,7 +92,7 @@ std::vector<std::int64_t> timesOf(const FbxAnimStack& stack) {
     std::size_t sorted = 0;
     eachCurve(stack, [&](const CurveKeys& keys) {
         times.insert(times.end(), keys.times.begin(), keys.times.end());
-        if (times.size() < 2 * sorted + 1024) // mostly the curves have their keys at the same times
+        if (times.size() < 2 * sorted + 1024) // usually the curves have their keys at the same times
             return;
         sortOut(times);
         sorted = times.size();

@@ -128,7 +128,7 @@ void bindTransform(FbxNode& node, NodeEvaluation& state) {
     binding.rotation = bindAnimation(node.LclRotation, stack);
     binding.scaling = bindAnimation(node.LclScaling, stack);
 
-    // Pre- and post-rotation and the order are in force only while rotation is active, and not for its limits alone.
+    // Pre- and post-rotation and the order are used only while rotation is active, unless they serve the limits only.
     binding.preRotation = binding.postRotationInverse = kIdentity;
     if (node.GetRotationActive() && !node.GetRotationSpaceForLimitOnly(FbxNode::eSourcePivot)) {
         binding.preRotation = axesOf(node.GetPreRotation(FbxNode::eSourcePivot));

@@ -100,10 +100,10 @@ struct NodeEvaluation {
     NodeEvaluation* previousUsed = nullptr;
 };
 
-/// The nodes of one manager that hold cached transforms, and how many places they take in all.
+/// The nodes of one manager that hold cached transforms, and the total number of their entries.
 class EvaluationBudget {
 public:
-    /// The transforms of all caches, in places of about 200 bytes each: 13 MiB.
+    /// The transforms of all caches, in entries of about 200 bytes each: 13 MiB.
     static constexpr std::size_t kMostPlaces = std::size_t{1} << 16U;
 
     TimeNumbers times;
@@ -125,12 +125,12 @@ private:
     TransformCache mSpare;         ///< of the node that was released last, reused by the next one
 };
 
-/// Made when a manager's first node is evaluated.
+/// Created when a manager's first node is evaluated.
 [[nodiscard]] EvaluationBudget& evaluationBudgetOf(ManagerData& manager);
 
 /// The node's matrix relative to its parent, at the time (or of the static values at FBXSDK_TIME_INFINITE).
 FbxAMatrix evaluateLocal(FbxNode& node, const FbxTime& time);
-/// The node's matrix in the world.
+/// The node's global matrix.
 void evaluateGlobal(FbxNode& node, const FbxTime& time, FbxAMatrix& matrix);
 
 } // namespace detail

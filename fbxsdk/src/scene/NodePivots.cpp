@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The transform data of nodes: pivots, offsets, pre- and post-rotation, order and inherit type. The source set is the
-// node's properties; the destination set is stored beside them.
+// node's properties; the destination set is stored separately.
 #include "scene/NodePivots.h"
 
 #include <fbxsdk/FbxNode.h>

@@ -12,7 +12,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Everything below a node, each node before its children. The tree must not change meanwhile.
+/// All descendants of a node, each node before its children. The tree must not change meanwhile.
 template <class Node>
 class NodesBelow {
 public:

@@ -24,7 +24,7 @@ FbxAnimLayer* firstLayer(const FbxProperty& property) {
     return stack ? stack->GetMember<FbxAnimLayer>(0) : nullptr;
 }
 
-/// Null selects the first channel. Files and hosts name colour channels by component, so X, Y and Z also stand for R, G
+/// Null selects the first channel. Files and hosts name colour channels by component, so X, Y and Z also mean R, G
 /// and B where a node has those.
 int channelOf(const FbxAnimCurveNode& node, const char* channel) {
     if (!channel)

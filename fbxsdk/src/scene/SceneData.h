@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The data of a scene: its settings, lists of members by class, and the files it was read from.
 #pragma once
 
 #include <memory>
@@ -19,6 +17,7 @@ namespace detail {
 extern const PropertyRow kDocumentTable[1];
 inline constexpr std::span<const PropertyRow> kDocumentRows{kDocumentTable}; ///< of documents and scenes
 
+/// The data of a scene: its settings, lists of members by class, and the files it was read from.
 struct SceneData final : Membership {
     explicit SceneData(FbxScene& owner) : Membership(owner), lights(owner), cameras(owner), times(owner) {}
 

@@ -51,7 +51,7 @@ private:
     std::vector<std::int64_t> mTicks; ///< by number, modulo kKept
     std::unordered_map<std::int64_t, std::uint64_t> mNumbers;
     std::uint64_t mNext = 0;
-    std::uint64_t mLast = 0; ///< that was asked for
+    std::uint64_t mLast = 0; ///< that was requested
 };
 
 } // namespace detail

@@ -21,7 +21,7 @@ constinit const FbxSystemUnit FbxSystemUnit::Yard(91.44);
 constinit const FbxSystemUnit::ConversionOptions FbxSystemUnit::DefaultConversionOptions;
 
 double FbxSystemUnit::GetConversionFactorTo(const FbxSystemUnit& pTarget) const {
-    // kept: the multiplier is carried along and enters no conversion.
+    // kept: the multiplier is stored and has no part in conversions.
     return mScaleFactor / pTarget.mScaleFactor;
 }
 
@@ -41,7 +41,7 @@ namespace {
 
 int signOf(int number) { return number < 0 ? -1 : 1; }
 
-/// The two axes beside the up axis: even first, then odd.
+/// The two axes other than the up axis: even first, then odd.
 constexpr int kOthers[3][2] = {{1, 2}, {0, 2}, {0, 1}};
 
 /// Up × front with its sign: the third axis of a right-handed system.

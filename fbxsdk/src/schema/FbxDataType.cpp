@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Property types: what each holds, and its two type strings in files.
+// Property types: the kind of their values, and their two type strings in files.
 #include "schema/PropertyTypes.h"
 
 #include "schema/NameIndex.h"
@@ -10,7 +10,7 @@
 FBXSDK_NAMESPACE_BEGIN
 
 // clang-format off
-/// Constant, what it holds, name for users, first and second type string. What may be animated is spelt another way in
+/// Constant, kind of value, name for users, first and second type string. Animatable types are spelt differently in
 /// files: "Number" for "double", "Vector" for "Vector3D", "Color" for "ColorRGB".
 #define FBXSDK_DATA_TYPES(ROW) \
     ROW(FbxBoolDT, eFbxBool, "Bool", "bool", "") \

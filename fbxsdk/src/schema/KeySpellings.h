@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How files spell the keys of curves: the bits of their flags, and the letters of what a curve does beyond its keys. In
-// files before 7.0 letters stand for the flags, too.
+// How files spell the keys of curves: the bits of their flags, and the letters of the extrapolation. In
+// files before 7.0 letters represent the flags, too.
 #pragma once
 
 #include <cstddef>
@@ -18,7 +18,7 @@ namespace KeyFlag {
 constexpr std::uint32_t constant = 0x2;
 constexpr std::uint32_t linear = 0x4;
 constexpr std::uint32_t cubic = 0x8;
-constexpr std::uint32_t constantNext = 0x100; ///< with `constant`: the value of the next key holds
+constexpr std::uint32_t constantNext = 0x100; ///< with `constant`: the value of the next key is held
 constexpr std::uint32_t tangentAuto = 0x100;  ///< with `cubic`
 constexpr std::uint32_t tangentTcb = 0x200;
 constexpr std::uint32_t tangentUser = 0x400;
@@ -34,7 +34,7 @@ constexpr std::uint32_t velocityNextLeft = 0x20000000;
 
 /// Weights and velocities are stored as whole numbers of this unit.
 inline constexpr float kPackedUnit = 9999.0F;
-/// So many words hold the numbers of a key.
+/// The number of words that hold the numbers of a key.
 inline constexpr std::size_t kWordsPerAttribute = 4;
 
 enum class ExtrapolationType : std::uint8_t {
@@ -57,15 +57,15 @@ inline constexpr ExtrapolationRow kExtrapolations[] = {{'C', ExtrapolationType::
 
 // Before 7.0: time, value, the letter of the interpolation, and what that needs.
 inline constexpr char kLegacyLinear = 'L', kLegacyConstant = 'C', kLegacyCubic = 'U';
-/// Behind kLegacyConstant: whether the value of this key holds, or that of the next.
+/// After kLegacyConstant: whether the value of this key is held, or that of the next.
 inline constexpr char kLegacyConstantThis = 's', kLegacyConstantNext = 'n';
 
-/// Behind kLegacyCubic: the tangent's letter.
+/// After kLegacyCubic: the tangent's letter.
 struct LegacyTangentRow {
     char letter;
     std::uint32_t flags;
     std::size_t numbers; ///< how many numbers follow …
-    bool kept;           ///< … and whether they are the first of the key's; automatic tangents are computed anew
+    bool kept;           ///< … and whether they are the first of the key's; automatic tangents are recomputed
 };
 inline constexpr LegacyTangentRow kLegacyTangents[] = {
     {'s', KeyFlag::tangentUser, 2, true},                                     // right slope, left slope of the next key
@@ -77,7 +77,7 @@ inline constexpr LegacyTangentRow kLegacyTangents[] = {
     {'d', KeyFlag::tangentAuto | KeyFlag::genericBreak, 1, false},            // a slope
 };
 
-/// Behind the tangent: which weights follow, the right one first.
+/// After the tangent: which weights follow, the right one first.
 struct LegacyWeightRow {
     char letter;
     std::uint32_t flags;

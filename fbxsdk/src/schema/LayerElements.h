@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How files call layer elements, their arrays and modes.
+// How files name layer elements, their arrays and modes.
 #pragma once
 
 #include <array>
@@ -12,7 +12,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Of FbxLayerElement::EType the numbers of those that files have. Geometry asserts that they are the same.
+/// The numbers of FbxLayerElement::EType for the types that files have. Geometry asserts that they are equal.
 namespace LayerElementType {
 enum : int {
     normal = 1,
@@ -33,7 +33,7 @@ enum : int {
 
 /// How an element stores its values.
 enum class LayerElementStorage {
-    values,  ///< values, and perhaps indices to them
+    values,  ///< values, with optional indices to them
     numbers, ///< indices into something else: the materials or textures of a node
     groups,  ///< indices that are the values
 };
@@ -47,7 +47,7 @@ struct LayerElementRow {
     int legacyVersion;                      ///< in files before 7.0
 };
 
-/// In the order of files, where texture coordinates stand between the two halves and textures behind both.
+/// In the order of files, where texture coordinates are between the two halves and textures after both.
 inline constexpr LayerElementRow kLayerElements[] = {
     {"LayerElementNormal", LayerElementType::normal, LayerElementStorage::values, "Normals", "NormalsW", "NormalsIndex",
      0, 101},
@@ -104,13 +104,13 @@ inline constexpr LayerChannelRow kLayerChannels[] = {
     return {channel.textures, type, LayerElementStorage::numbers, "", "", "TextureId", 101, 101};
 }
 
-/// The place in the table is the number of FbxLayerElement::EMappingMode.
+/// The index in the table is the number of FbxLayerElement::EMappingMode.
 inline constexpr std::array<std::string_view, 6> kMappingModes = {
     "NoMappingInformation", "ByVertice", "ByPolygonVertex", "ByPolygon", "ByEdge", "AllSame"};
-/// Further spellings of the mode by control point, which files have and nobody needs to write.
+/// Further spellings of the mode by control point, which files have and writers do not need.
 inline constexpr std::array<std::string_view, 2> kControlPointMappings = {"ByVertex", "ByControlPoint"};
 
-/// The place in the table is the number of FbxLayerElement::EReferenceMode. Old files say "Index" for the last one.
+/// The index in the table is the number of FbxLayerElement::EReferenceMode. Old files say "Index" for the last one.
 inline constexpr std::array<std::string_view, 3> kReferenceModes = {"Direct", "Index", "IndexToDirect"};
 
 } // namespace detail

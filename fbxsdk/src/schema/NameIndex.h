@@ -17,7 +17,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// A name, and what a look-up compares first: its length and both ends. Of a literal the compiler works them out.
+/// A name, and what a look-up compares first: its length and both ends, for a literal computed by the compiler.
 class NameKey {
 public:
     explicit constexpr NameKey(std::string_view name)

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What older files call properties, and how files before 7.0 spell the frame rate.
+// The names of properties in older files, and the spelling of the frame rate in files before 7.0.
 #pragma once
 
 #include <cstdint>
@@ -15,7 +15,7 @@ namespace detail {
 /// A property of a kind of attribute: its name in older files, and the present one.
 struct OldPropertyName {
     std::string_view subClass, className, oldName, newName;
-    bool written; ///< files before 7.0 are given the old name
+    bool written; ///< files before 7.0 are written with the old name
 };
 inline constexpr OldPropertyName kOldPropertyNames[] = {
     {"Light", "FbxLight", "HotSpot", "InnerAngle", true},
@@ -43,7 +43,7 @@ inline constexpr LegacyRateRow kLegacyRates[] = {
     {10, "25", true}, {11, "24", true},    {12, "1000", true}, {13, "23.976", true}, {15, "96", true},
     {16, "72", true}, {17, "59.94", true},
 };
-/// The mode of all other rates, which are stated beside it.
+/// The mode of all other rates, which are stored separately.
 inline constexpr std::int64_t kCustomTimeMode = 14;
 
 } // namespace detail

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The names of the application's views, which files before 7.0 carry beside the node tree.
+// The names of the application's views, which files before 7.0 hold outside of the node tree.
 #pragma once
 
 #include <array>

@@ -16,7 +16,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// The letters of single flags. The place in the table is the bit of FbxPropertyFlags::EFlags; 0 has no letter.
+/// The letters of single flags. The index in the table is the bit of FbxPropertyFlags::EFlags; 0 has no letter.
 inline constexpr std::array<char, 6> kFlagLetters = {0, 'A', '+', 0, 'U', 'H'};
 
 inline constexpr char kUserFlagLetter = kFlagLetters[4];
@@ -32,7 +32,7 @@ inline constexpr unsigned kComponentMask = 0xF;
 /// Before 7.0: the property is one of the node attribute, which has no record of its own there.
 inline constexpr char kAttributeFlagLetter = 'N';
 
-/// The bits of FbxPropertyFlags::EFlags that a file states. Letters without a meaning count for nothing.
+/// The bits of FbxPropertyFlags::EFlags that a file states. Letters without a meaning are ignored.
 [[nodiscard]] unsigned propertyFlags(std::string_view text);
 
 /// The letters of the flags that files state.

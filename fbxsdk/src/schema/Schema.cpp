@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Types that the tables need beside the public ones.
+// Types for the tables, in addition to the public ones.
 #include "schema/Schema.h"
 
 FBXSDK_NAMESPACE_BEGIN

@@ -3,8 +3,8 @@
 //
 // The properties that each class of objects has, with types and defaults.
 //
-// The tables stand in the Schema*.cpp sources. Their sizes stand here, so that the spans are constants: a class can
-// take its rows before any initialiser has run, whatever the order of the sources.
+// The tables are in the Schema*.cpp sources. Their sizes are here, so that the spans are constants: a class can
+// use its rows before any initialiser has run, whatever the order of the sources.
 #pragma once
 
 #include <span>
@@ -15,7 +15,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Types that differ from the plain ones in files only: there, what may be animated is spelt another way.
+/// Types that differ from the plain ones in files only: there, animatable types are spelt differently.
 extern const FbxDataType kAnimatableBoolType, kAnimatableIntType;
 
 extern const PropertyRow kNodeTable[71];
@@ -94,7 +94,7 @@ inline constexpr std::span<const PropertyRow> kVideoRows{kVideoTable};
 extern const PropertyRow kGlobalSettingsTable[20];
 inline constexpr std::span<const PropertyRow> kGlobalSettingsRows{kGlobalSettingsTable};
 
-/// The place of the row of that name; -1 when there is none.
+/// The index of the row of that name; -1 when there is none.
 [[nodiscard]] int rowIndex(std::span<const PropertyRow> rows, std::string_view name);
 
 } // namespace detail

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Properties of lights and of attributes that are only shown. Order, types and defaults are those of files.
+// Properties of lights and of attributes for display. Order, types and defaults are those of files.
 #include "schema/Schema.h"
 
 FBXSDK_NAMESPACE_BEGIN

@@ -138,7 +138,7 @@ constexpr PropertyRow kStereoOnly[kStereoOnlyRowCount] = {
     {"RelativePrecompFileName", &FbxStringDT, ""},
 };
 
-/// A stereo rig is a camera with more.
+/// A stereo rig has the properties of a camera and more.
 constexpr auto stereoTable() {
     std::array<PropertyRow, std::size(kCameraTable) + kStereoOnlyRowCount> table{};
     std::copy(std::begin(kStereoOnly), std::end(kStereoOnly),

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How files spell what the API has enumerators for. The place in a table is the enumerator's number.
+// How files spell the enumerators of the API. The index in a table is the enumerator's number.
 #pragma once
 
 #include <algorithm>
@@ -20,7 +20,7 @@ inline constexpr std::array<std::string_view, 4> kSkeletonTypes = {"Root", "Limb
 inline constexpr std::array<std::string_view, 4> kMarkerTypes = {"Marker", "OpticalMarker", "FKEffector", "IKEffector"};
 /// How a skin blends: FbxSkin::EType.
 inline constexpr std::array<std::string_view, 4> kSkinningTypes = {"Rigid", "Linear", "DualQuaternion", "Blend"};
-/// How a cluster counts: FbxCluster::ELinkMode. Files leave the first out.
+/// The link mode of a cluster: FbxCluster::ELinkMode. Files omit the first.
 inline constexpr std::array<std::string_view, 3> kLinkModes = {"Normalize", "Additive", "Total1"};
 /// The form of a surface in a direction, FbxNurbsSurfaceBase::EType, and of a curve: FbxNurbsCurve::EType.
 inline constexpr std::array<std::string_view, 3> kSurfaceForms = {"Periodic", "Closed", "Open"};
@@ -28,11 +28,11 @@ inline constexpr std::array<std::string_view, 3> kCurveForms = {"Open", "Closed"
 /// The type of a patch in a direction: FbxPatch::EType.
 inline constexpr std::array<std::string_view, 5> kPatchTypes = {"Bezier", "BezierQuadric", "Cardinal", "BSpline",
                                                                 "Linear"};
-/// The letter of a node's shading mode. Y, W and T are certain, by who writes them where; the others follow the modes'
-/// names.
+/// The letter of a node's shading mode. Y, W and T are confirmed by files of known writers; the others follow the
+/// modes' names.
 inline constexpr std::array<char, 6> kShadingModes = {'Y', 'W', 'F', 'L', 'T', 'U'};
 
-/// The number of a spelling; `otherwise` for what is none.
+/// The number of a spelling; `otherwise` for an unknown one.
 template <class T, std::size_t Count>
 [[nodiscard]] constexpr int numberOf(const std::array<T, Count>& table, T spelling, int otherwise) {
     const auto found = std::find(table.begin(), table.end(), spelling);

@@ -13,24 +13,24 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
 struct VersionTraits {
-    const char* name;      ///< as hosts ask for it
+    const char* name;      ///< as hosts request it
     std::uint32_t version; ///< as files state it
-    int generation;        ///< 6: names tell objects apart, takes hold the animation; 7: objects have ids, curves too
+    int generation;        ///< 6: names identify objects, takes hold the animation; 7: objects have ids, curves too
     // Which objects and properties a file has.
-    bool views;           ///< the application's views: producer cameras, what of them is hidden, their resolution
-    bool defaultsLeftOut; ///< properties that say what the template of their class says
-    bool inlineShapes;    ///< blend shapes stand inside their geometry, and their weights are its properties
-    bool modelStates;     ///< Models say whether they have several layers and takes
+    bool views;           ///< the application's views: producer cameras, their hidden parts, their resolution
+    bool defaultsLeftOut; ///< properties with the value of their class's template
+    bool inlineShapes;    ///< blend shapes are inside their geometry, and their weights are its properties
+    bool modelStates;     ///< Models state whether they have several layers and takes
     // Curves.
     int keyVersion;
     bool allTangents;           ///< keys can be automatic and clamped, broken or biased
-    bool relativeExtrapolation; ///< curves can repeat from where they ended
+    bool relativeExtrapolation; ///< curves can repeat relative to their end
     // Geometry and deformers.
     int normalVersion;  ///< of layer elements of normals, tangents and binormals …
     bool fourthNumbers; ///< … which have a fourth number from 102 on
     bool shapeVersion;  ///< shapes state one
     int skinVersion;
-    bool skinningType; ///< skins say how they blend
+    bool skinningType; ///< skins state how they blend
 };
 
 // clang-format off
@@ -47,7 +47,7 @@ inline constexpr VersionTraits kVersionTraits[] = {
 };
 // clang-format on
 
-/// What is written unless somebody asks for another.
+/// The version written by default.
 inline constexpr const VersionTraits& kNewestVersion = kVersionTraits[5];
 
 /// The row of that name; null when there is none.

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// An extension of this platform, not part of the documented API, and not included by <fbxsdk.h>: what a file says of
-// its objects beyond what they are. Programs that are to compile against another SDK do without it.
+// An extension of this platform, not part of the documented API, and not included by <fbxsdk.h>: what a file states
+// about its objects beyond the API. Programs that also compile against another SDK do without it.
 #pragma once
 
 #include <cstdint>
@@ -13,18 +13,18 @@
 #include <fbxsdk/FbxScene.h>
 
 FBXSDK_NAMESPACE_BEGIN
-/// What this platform knows beyond the documented API. `<fbxsdk.h>` does not include it.
+/// Facts that this platform has beyond the documented API. `<fbxsdk.h>` does not include it.
 namespace extensions {
 
 /// The number by which the file names the object in its connections; 0 when the object comes from no file. Files before
-/// 7.0 name objects by their names: numbers are made up for theirs.
+/// 7.0 identify objects by name: numbers are generated for theirs.
 [[nodiscard]] FBXSDK_DLL std::int64_t fileIdOf(const FbxObject& object);
 
-/// Whether the property says anything of its own: the file or its templates state it, it was set, or it is connected or
+/// Whether the property has a value of its own: the file or its templates state it, it was set, or it is connected or
 /// animated. Otherwise it has the default of its class. False for an invalid property.
 [[nodiscard]] FBXSDK_DLL bool isStated(const FbxProperty& property);
 
-/// All objects of the scene, in the order of their entry: what GetSrcObject hands out one by one, in one walk.
+/// All objects of the scene, in the order of their entry: what GetSrcObject returns one by one, in one pass.
 [[nodiscard]] FBXSDK_DLL std::vector<FbxObject*> objectsOf(const FbxScene& scene);
 
 } // namespace extensions

@@ -2,8 +2,8 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // An extension of this platform, not part of the documented API, and not included by <fbxsdk.h>: a file as the records
-// that it is made of, whatever they mean. For those who write readers and writers of the format, and look for what a
-// program has put where.
+// that it consists of, whatever they mean. For authors of readers and writers of the format, and for finding where a
+// program stores something.
 #pragma once
 
 #include <cstddef>
@@ -26,16 +26,16 @@ namespace extensions {
 
 /// One value of a record.
 struct RecordValue {
-    /// What the value is.
+    /// The kind of the value.
     enum EType {
         eInteger, ///< a whole number
         eReal,    ///< a number with a fraction
         eText,    ///< text
         eBytes,   ///< bytes of any meaning
         eWord,    ///< a bare word of an ASCII file, a single letter of a binary one
-        eList     ///< an array, or the many numbers that files before 7.0 list one by one
+        eList     ///< an array, or the numbers that files before 7.0 list one by one
     };
-    EType type = eInteger; ///< which of the following members count
+    EType type = eInteger; ///< which of the following members is valid
     /// The letter of the type in a binary file: I, L, D, S …, of a list that of its elements (i, d … for an array, I, D
     /// … for single numbers); 0 in an ASCII file.
     char code = 0;
@@ -44,7 +44,7 @@ struct RecordValue {
     std::string_view text;    ///< of texts, bytes and words, as the file has them
 
     std::uint64_t count = 0;       ///< of a list: its numbers
-    std::uint64_t storedBytes = 0; ///< of a list: what it takes in the file
+    std::uint64_t storedBytes = 0; ///< of a list: its size in the file
     /// How the numbers of a list are stored.
     enum EElement {
         eInt8,    ///< 8 bits
@@ -58,13 +58,13 @@ struct RecordValue {
     bool compressed = false;     ///< of a list: its bytes are deflated
 };
 
-/// A handle to one record; valid as long as its file. An empty one stands for "there is none".
+/// A handle to one record; valid as long as its file. An empty one means that there is none.
 class FBXSDK_DLL FileRecord {
 public:
     FileRecord() = default;
     explicit FileRecord(const detail::Record* record) : mRecord(record) {} ///< The platform's own.
 
-    /// Whether there is a record; the other calls need one.
+    /// Whether there is a record; the other calls require one.
     explicit operator bool() const { return mRecord != nullptr; }
     [[nodiscard]] std::string_view name() const; ///< As the file has it; valid as long as the file.
     /// The offset of its first byte in the file.
@@ -89,7 +89,7 @@ private:
     const detail::Record* mRecord = nullptr;
 };
 
-/// A file cut into records.
+/// A file as a tree of records.
 class FBXSDK_DLL RecordFile {
 public:
     /// Null when the file cannot be read; the status then says which file, where in it, and what is wrong.
@@ -98,11 +98,11 @@ public:
     RecordFile(const RecordFile&) = delete;
     RecordFile& operator=(const RecordFile&) = delete;
 
-    /// As the head of the file says; 0 when an ASCII file says nothing.
+    /// As the header of the file states; 0 when an ASCII file has none.
     [[nodiscard]] std::uint32_t version() const;
-    [[nodiscard]] bool isAscii() const;     ///< Text, else binary.
-    [[nodiscard]] bool isBigEndian() const; ///< Whether a binary file has its highest bytes first, as some old ones do.
-    [[nodiscard]] std::uint64_t size() const; ///< Bytes of the file.
+    [[nodiscard]] bool isAscii() const;       ///< Text, else binary.
+    [[nodiscard]] bool isBigEndian() const;   ///< Whether a binary file is big-endian, as some old ones are.
+    [[nodiscard]] std::uint64_t size() const; ///< Size of the file in bytes.
     /// The first record of the top level.
     [[nodiscard]] FileRecord first() const;
     /// The number of the line in an ASCII file that the record starts on, from 1; 0 in a binary one. Quick for records

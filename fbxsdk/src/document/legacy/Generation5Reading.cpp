@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files before 6.0: Models stand at the top level and hold everything that belongs to them.
+// Files before 6.0: Models are at the top level and hold everything that belongs to them.
 #include <algorithm>
 #include <set>
 #include <unordered_map>
@@ -41,7 +41,7 @@ private:
         const std::string_view kind = legacyKindOf(record);
         const std::int64_t model = mObjects.add(fullName, "Model", kind, &record);
         mObjects.at(model).properties = legacyModelProperties(mBuilder, record);
-        // Elsewhere the file may name it with or without its class.
+        // Elsewhere the file may refer to it with or without its class.
         mObjects.addAlias(mObjects.at(model).name, model);
         mModels.emplace_back(&record, model);
         if (!kind.empty()) {
@@ -60,7 +60,7 @@ private:
         }
     }
 
-    /// Every Model holds a copy of its materials; equal ones of one name are one.
+    /// Every Model holds a copy of its materials; equal ones of the same name are merged.
     void addMaterial(const Record& record, std::int64_t model) {
         const auto [entry, isNew] = mMaterials.try_emplace(record.value(0).toText(), &record, 0);
         if (isNew || !sameRecords(*entry->second.first, record)) {
@@ -76,7 +76,7 @@ private:
         if (!children)
             return true;
         for (const Value& name : children->values) {
-            // A bare word here is a sign of damage: what it was meant to be cannot be known.
+            // A bare word here is a sign of damage: its meaning cannot be recovered.
             if (name.type == Value::Type::word) {
                 status.SetCode(FbxStatus::eInvalidFile, "%s, %s: a name in the list of children is not quoted.",
                                mBuilder.tree().fileName.c_str(), mBuilder.tree().placeOf(*children).c_str());
@@ -128,7 +128,7 @@ private:
                 readModel(record, record.value(0).toText());
     }
 
-    /// A Model's own channels are its static pose; what they leave out stands in the current take.
+    /// A Model's own channels are its static pose; what they omit is in the current take.
     void setStaticValues() {
         for (const auto& [record, id] : mModels)
             setStaticValues(id, *record);
@@ -170,7 +170,7 @@ private:
             setShapeWeight(mBuilder, mObjects.at(channel.owner), values);
             return;
         }
-        // The three parts of the transform and a visibility have the type of their name.
+        // The three parts of the transform and a visibility have types named after them.
         const bool named = vector || channel.property == "Visibility";
         mObjects.setProperty(channel.owner,
                              propertyOf(channel.property, named ? channel.property : "Number", "", "A", values));

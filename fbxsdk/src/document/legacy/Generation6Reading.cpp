@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files of the 6.x generation: objects are known by name, a Model holds its node attribute as well, and the animation
-// stands in takes.
+// Files of the 6.x generation: objects are identified by name, a Model holds its node attribute as well, and the
+// animation is in takes.
 #include <algorithm>
 
 #include "document/PropertyNames.h"
@@ -31,10 +31,10 @@ bool hasPoints(const Record& model) {
                        [&](std::string_view name) { return model.child(name) != nullptr; });
 }
 
-/// The properties of a Model record, told apart: its own, and those of its attribute.
+/// The properties of a Model record, separated: its own, and those of its attribute.
 struct SplitProperties {
     std::vector<DocumentProperty> model, attribute;
-    bool flagged = false; ///< whether the file says of any that it is the attribute's
+    bool flagged = false; ///< whether the file flags any as the attribute's
 };
 
 DocumentProperty readProperty(DocumentBuilder& builder, const Record& line) {
@@ -73,7 +73,7 @@ SplitProperties splitProperties(DocumentBuilder& builder, const Record& model) {
     return split;
 }
 
-/// Two Models with equal attributes under one attribute name are instances of it.
+/// Two Models with equal attributes of the same name are instances of it.
 struct SharedAttribute {
     const Record* model = nullptr;
     std::int64_t attribute = 0;
@@ -133,7 +133,7 @@ private:
                     (this->*readOne)(record);
     }
 
-    /// Which deformers lead to which Model must be known before its attribute is made.
+    /// The deformers of each Model must be known before its attribute is created.
     void findDeformers() {
         std::unordered_map<std::string_view, bool> isDeformer;
         for (const Record& list : mBuilder.root().children())

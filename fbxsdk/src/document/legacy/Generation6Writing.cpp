@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files of version 6.1: objects are known by name and list all their properties, a Model holds its attribute, and the
-// animation stands in takes. The mirror of Generation6.
+// Files of version 6.1: objects are identified by name and list all their properties, a Model holds its attribute, and
+// the animation is in takes. The inverse of Generation6Reading.
 #include <algorithm>
 
 #include "document/DocumentSections.h"
@@ -19,7 +19,7 @@ namespace {
 /// Settings that this generation does not have.
 constexpr std::string_view kNewerSettings[] = {"TimeMarker", "CurrentTimeMarker"};
 
-/// Properties of objects that this generation does not have, and the value that goes without saying.
+/// Properties of objects that this generation does not have, and their implied values.
 constexpr struct {
     std::string_view name;
     double value;
@@ -140,7 +140,7 @@ private:
         if (object.content->before)
             object.content->before(mSink, mTraits);
         writeProperties(object, attribute);
-        // An attribute by itself says what it is by its subclass, and has no further records.
+        // An attribute of its own states its kind in its subclass, and has no further records.
         if (object.content->after && object.record != "NodeAttribute")
             object.content->after(mSink, mTraits);
         if (attribute)
@@ -170,7 +170,7 @@ private:
         mSink.objectName(name.nameClass, name.name);
     }
 
-    /// The attribute's properties stand behind the Model's own, with a letter that says so.
+    /// The attribute's properties follow the Model's own, marked by a letter.
     void writeProperties(const DocumentObject& object, const DocumentObject* attribute) {
         const BlockScope block(mSink, "Properties60");
         for (const DocumentProperty& property : object.properties)
@@ -179,7 +179,7 @@ private:
             writeAttributeProperties(*attribute);
     }
 
-    /// Those that have other names here stand last.
+    /// Those with other names here are last.
     void writeAttributeProperties(const DocumentObject& attribute) {
         std::vector<const DocumentProperty*> renamed;
         for (const DocumentProperty& property : attribute.properties) {
@@ -226,7 +226,7 @@ private:
         if (!isConnectable(connection.source) || !isConnectable(connection.destination))
             return;
         const bool betweenObjects = connection.sourceProperty.empty() && connection.destinationProperty.empty();
-        // The attribute stands inside.
+        // The attribute is inside.
         const DocumentObject* held = mLayout.attributeOf(connection.destination);
         if (betweenObjects && held && held->id == connection.source)
             return;

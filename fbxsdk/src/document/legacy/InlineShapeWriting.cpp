@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From a chain of deformers to Shape records inside a geometry.
+// Converts a chain of deformers to Shape records inside a geometry.
 
 #include <algorithm>
 #include <set>
@@ -135,7 +135,7 @@ private:
         };
     }
 
-    /// The curve node of a weight drives the geometry's property now, and is named after it.
+    /// The curve node of a weight now drives the geometry's property, and is named after it.
     void moveAnimation() {
         std::unordered_map<std::int64_t, std::string_view> nodes; ///< the component's new name
         for (DocumentConnection& connection : mDocument.connections) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From Shape records inside a geometry to a chain of deformers.
+// Converts Shape records inside a geometry to a chain of deformers.
 #include "document/legacy/InlineShapes.h"
 
 #include <map>
@@ -65,11 +65,11 @@ InlineShape addChannel(DocumentBuilder& builder, std::int64_t blendShape, const 
     return {name, channel};
 }
 
-/// The channels of weights that used to be properties, by the geometry and the property's name.
+/// The channels of weights that were properties, by the geometry and the property's name.
 using MovedWeights = std::map<std::pair<std::int64_t, std::string_view>, std::int64_t>;
 
-/// The connection of a curve node to the geometry's property goes to the channel's instead; and since the node's
-/// component is named after the property, so do the node's own property and its connections.
+/// The connection of a curve node to the geometry's property is redirected to the channel's; and since the node's
+/// component is named after the property, the node's own property and its connections change as well.
 class AnimationMover {
 public:
     AnimationMover(Document& document, const MovedWeights& moved) : mDocument(document), mMoved(moved) {}

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Tables from records to properties.
+// Tables of the records that become properties.
 #include "document/legacy/LegacyRecords.h"
 
 #include <algorithm>
@@ -10,7 +10,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// A record that is a property of the same values under another name.
+/// A record that becomes a property of the same values under another name.
 struct RecordRow {
     std::string_view record, property, typeName, subTypeName, flags;
     std::size_t values;
@@ -83,7 +83,7 @@ constexpr RecordRow kMaterialRows[] = {
     {"Alpha", "Opacity", "double", "Number", "", 1},
 };
 
-/// Film formats by the name that old files give them; the position is the number.
+/// Film formats by their name in old files; the index is the number.
 constexpr std::string_view kFilmFormats[] = {
     "Custom",
     "16mm Theatrical",
@@ -99,7 +99,7 @@ constexpr std::string_view kFilmFormats[] = {
     "IMAX",
 };
 
-/// TypeFlags say less than Type, but stand alone in some records.
+/// TypeFlags are less specific than Type, but some records have nothing else.
 constexpr std::pair<std::string_view, std::string_view> kKindsOfFlags[] = {{"Skeleton", "LimbNode"}};
 
 using Properties = std::vector<DocumentProperty>;

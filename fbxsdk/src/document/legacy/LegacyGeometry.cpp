@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From plain arrays beside the vertices to layer elements.
+// Converts plain arrays next to the vertices to layer elements.
 #include "document/legacy/LegacyRecords.h"
 
 #include <algorithm>
@@ -12,7 +12,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Records of the Model that become layer elements, and those that are no part of the geometry.
+/// Records of the Model that become layer elements, and those that are not part of the geometry.
 constexpr std::string_view kReplacedRecords[] = {
     "Normals",          "MaterialAssignation",
     "Materials",        "GeometryUVInfo",
@@ -22,7 +22,7 @@ constexpr std::string_view kReplacedRecords[] = {
     "AnimatedProperty", "Animated",
 };
 
-/// Files of this version have a normal per control point even where the counts say nothing.
+/// Files of this version have a normal per control point even where the counts do not include them.
 constexpr std::uint32_t kPointNormalsVersion = 5000;
 
 // Of the tables of layer elements: the rows, mappings and references that older geometry has.

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The key list of files before 7.x: time, value, then letters and numbers that say how the curve goes on.
+// The key list of files before 7.x: time, value, then letters and numbers that define the following segment.
 #include "document/legacy/LegacyKeys.h"
 
 #include <algorithm>
@@ -11,15 +11,15 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Reads key by key. Whether a letter follows is seen from the list itself: versions of the format differ in what they
-/// leave out, but the next key always begins with a number.
+/// Reads key by key. Whether a letter follows is determined by the list itself: versions of the format differ in what
+/// they omit, but the next key always begins with a number.
 class KeyList {
 public:
     explicit KeyList(std::span<const Value> values) : mValues(values) {}
 
     [[nodiscard]] bool atEnd() const { return mNext == mValues.size(); }
 
-    /// False when the list does not hold a key at this place.
+    /// False when the list has no key at this position.
     bool read(std::int64_t& time, float& value, KeyAttributes& attribute) {
         if (atEnd() || !mValues[mNext].isNumber())
             return false;
@@ -125,7 +125,7 @@ private:
     std::size_t mNext = 0;
 };
 
-/// False when the list does not hold whole keys, or not as many as the channel says.
+/// False when the list does not consist of whole keys, or not of as many as the channel states.
 bool readKeys(DocumentBuilder& builder, const Record& channel, const Record& keys, CurveKeys& curve) {
     KeyList list(keys.values);
     while (!list.atEnd()) {
@@ -144,8 +144,8 @@ bool readKeys(DocumentBuilder& builder, const Record& channel, const Record& key
     return !count || std::cmp_equal(count->value(0).toInteger(), curve.times.size());
 }
 
-/// Automatic keys are flat at both ends of a curve, as applications show what they write with the letter 'a': what 7.x
-/// files say of such keys is that their tangents are clamped progressively.
+/// Automatic keys are flat at both ends of a curve, as applications show what they write with the letter 'a': 7.x
+/// files mark the tangents of such keys as progressively clamped.
 void flattenEnd(CurveKeys& curve, std::size_t key) {
     constexpr std::uint32_t kModes = KeyFlag::cubic | KeyFlag::tangentAuto | KeyFlag::tangentTcb |
                                      KeyFlag::tangentUser | KeyFlag::genericBreak | KeyFlag::genericClamp;

@@ -11,14 +11,14 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// The curve of a channel, its values multiplied; none when it has no keys or its key list does not add up (then with a
+/// The curve of a channel, its values multiplied; none when it has no keys or its key list is inconsistent (then with a
 /// warning).
 [[nodiscard]] std::optional<CurveKeys> readLegacyCurve(DocumentBuilder& builder, const Record& channel, double scale);
 
 /// Reads the extrapolation block of that name; constant when there is none.
 [[nodiscard]] Extrapolation readExtrapolation(const Record& owner, std::string_view name);
 
-/// Puts the keys in order of time; of keys at the same time the one that stands last stays.
+/// Sorts the keys by time; of keys at the same time the last one is kept.
 void sortKeys(CurveKeys& curve);
 
 } // namespace detail

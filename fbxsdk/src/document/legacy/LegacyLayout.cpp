@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Who holds whom, from the document's connections.
+// Which object contains which, from the document's connections.
 #include "document/legacy/LegacyLayout.h"
 
 #include <algorithm>
@@ -13,7 +13,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Kinds that exist as parts of takes only.
+/// Kinds that exist only as parts of takes.
 constexpr std::string_view kAnimationRecords[] = {"AnimationStack", "AnimationLayer", "AnimationCurveNode",
                                                   "AnimationCurve"};
 
@@ -22,7 +22,7 @@ bool isAnimation(const DocumentObject& object) {
            std::end(kAnimationRecords);
 }
 
-/// Curves and surfaces have records of their own; attributes and meshes stand inside their Models.
+/// Curves and surfaces have records of their own; attributes and meshes are inside their Models.
 bool standsInModel(const DocumentObject& object) {
     return object.record == "NodeAttribute" || (object.record == "Geometry" && object.subClass == "Mesh");
 }
@@ -51,7 +51,7 @@ void LegacyLayout::findAttributes() {
         const DocumentObject* model = find(connection.destination);
         const bool holds =
             betweenObjects(connection) && attribute && model && model->record == "Model" && standsInModel(*attribute);
-        // Of several attributes the first one stands in the Model.
+        // Of several attributes the first one is in the Model.
         if (holds && mAttributes.emplace(model->id, attribute).second)
             mHolders[attribute->id].push_back(model->id);
     }

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// What of a document stands where in a file before 7.0: attributes inside their Models, animation inside takes.
 #pragma once
 
 #include <unordered_map>
@@ -12,7 +10,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// A curve node of a document, resolved: what it drives, and its curves by component.
+/// A curve node of a document, resolved: its target, and its curves by component.
 struct DrivenProperty {
     std::string_view property;
     const DocumentObject* node = nullptr;
@@ -20,6 +18,7 @@ struct DrivenProperty {
     Curves curves; ///< by "d|X", …
 };
 
+/// The positions of a document's parts in a file before 7.0: attributes inside their Models, animation inside takes.
 class LegacyLayout {
 public:
     explicit LegacyLayout(const Document& document);
@@ -29,14 +28,14 @@ public:
     /// Null when there is none of that id.
     [[nodiscard]] const DocumentObject* find(std::int64_t id) const;
 
-    /// The attribute that stands inside a Model; null when it has none.
+    /// The attribute inside a Model; null when it has none.
     [[nodiscard]] const DocumentObject* attributeOf(std::int64_t model) const;
-    /// The Models that an attribute stands in; empty for what has a record of its own.
+    /// The Models that contain an attribute; empty for objects with a record of their own.
     [[nodiscard]] const std::vector<std::int64_t>& holdersOf(std::int64_t attribute) const;
     /// Whether the object has a record of its own in the file.
     [[nodiscard]] bool standsAlone(const DocumentObject& object) const;
 
-    /// The stacks, and what the base layer of each drives: by object, in the order of objects. Takes have no further
+    /// The stacks, and the objects that the base layer of each drives, in the order of objects. Takes have no further
     /// layers.
     using Driven = std::vector<std::pair<std::int64_t, std::vector<DrivenProperty>>>;
     [[nodiscard]] Driven drivenBy(std::string_view stack) const;
@@ -51,7 +50,7 @@ private:
     std::unordered_map<std::int64_t, const DocumentObject*> mAttributes;
     std::unordered_map<std::int64_t, std::vector<std::int64_t>> mHolders;
     std::unordered_map<std::string_view, std::int64_t> mBaseLayers; ///< by the name of the first stack that has one
-    // Of each layer its curve nodes, of each curve node its curves and what it drives.
+    // The curve nodes of each layer; the curves of each curve node and its target.
     std::unordered_map<std::int64_t, std::vector<std::int64_t>> mMembers;
     std::unordered_map<std::int64_t, DrivenProperty::Curves> mCurves;
     std::unordered_map<std::int64_t, std::vector<const DocumentConnection*>> mDriving;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Two passes: names that stand alone stay as they are, whatever numbered names their neighbours need.
+// Two passes: unique names stay unchanged, whatever numbered names the others need.
 #include "document/legacy/LegacyNames.h"
 
 #include "container/FileFormat.h"
@@ -32,7 +32,7 @@ LegacyNames::LegacyNames(const std::vector<DocumentObject>& objects) {
         else
             clashing.push_back(&object);
     }
-    std::unordered_map<std::string, int> numbers; // the last one that was given behind a name
+    std::unordered_map<std::string, int> numbers; // the last one that was used after a name
     for (const DocumentObject* object : clashing) {
         const std::string base = std::string(object->name) + "_ncl1_";
         int& number = numbers[keyOf(object->content->nameClass, base)];

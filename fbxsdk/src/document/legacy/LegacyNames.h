@@ -13,14 +13,14 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// The class and the name that files know an object by.
+/// The class and the name by which files identify an object.
 struct LegacyName {
     std::string_view nameClass;
     std::string name;
 };
 
-/// A name for every object that no other of its class has: the object's own, or, when that is taken, the same with a
-/// number behind it, `cube_ncl1_1`.
+/// A name for every object that is unique in its class: the object's own, or, when that is taken, the same followed by
+/// a number, `cube_ncl1_1`.
 class LegacyNames {
 public:
     explicit LegacyNames(const std::vector<DocumentObject>& objects);

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Named objects and the parts they are split into.
 #include "document/legacy/LegacyObjects.h"
 
 #include <algorithm>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What older files keep in records of their own: settings before 7.0, attributes and meshes before 6.0.
+// The data that older files keep in records of their own: settings before 7.0, attributes and meshes before 6.0.
 #pragma once
 
 #include <string_view>
@@ -12,7 +12,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// What stands in Version5 of a 6.x file and at the top level of older ones. Only fills what is not said yet.
+/// The content of Version5 of a 6.x file and of the top level of older ones. Only sets what is not set yet.
 void readLegacySettings(DocumentBuilder& builder, const Record& parent);
 
 /// The kind of attribute a Model record holds, in the spelling of 7.x: "Mesh", "Camera", …; empty for none.
@@ -22,7 +22,7 @@ void readLegacySettings(DocumentBuilder& builder, const Record& parent);
 [[nodiscard]] std::vector<DocumentProperty> legacyAttributeProperties(DocumentBuilder& builder, std::string_view kind,
                                                                       const Record& model);
 
-/// The properties of a Model apart from its transform.
+/// The properties of a Model except its transform.
 [[nodiscard]] std::vector<DocumentProperty> legacyModelProperties(DocumentBuilder& builder, const Record& model);
 
 /// The properties of a material.

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Channels of old takes, and the objects of 7.x that say the same.
+// Channels of old takes, and the equivalent objects of 7.x.
 #include "document/legacy/LegacyTakes.h"
 
 #include <algorithm>
@@ -29,7 +29,7 @@ struct AxisRow {
 };
 constexpr AxisRow kAxes[] = {{"X", "d|X"}, {"Y", "d|Y"}, {"Z", "d|Z"}};
 
-/// Behind the name of a shape in the channels of 5.x files.
+/// Follows the name of a shape in the channels of 5.x files.
 constexpr std::string_view kShapeSuffix = " (Shape)";
 
 const Record* channelNamed(const Record& parent, std::string_view name) {
@@ -47,7 +47,7 @@ std::vector<ChannelComponent> axesOf(const Record& channel) {
     return components;
 }
 
-/// Finds whose property a channel drives: a shape's weight, the attribute's or the object's own.
+/// Finds the owner of the property that a channel drives: a shape's weight, the attribute's or the object's own.
 LegacyChannel ownedChannel(LegacyObjects& objects, std::int64_t object, std::string_view name) {
     const LegacyModel* parts = objects.findModel(object);
     const bool suffixed = name.ends_with(kShapeSuffix);
@@ -88,7 +88,7 @@ void addNamed(LegacyObjects& objects, std::int64_t object, const Record& record,
     channels.push_back(std::move(channel));
 }
 
-/// One take on its way into the document.
+/// One take during its conversion.
 class TakeReader {
 public:
     TakeReader(LegacyObjects& objects, std::int64_t layer)
@@ -116,7 +116,7 @@ private:
             curves.push_back(readLegacyCurve(mBuilder, *component.record, channel.scale));
             keyed = keyed || curves.back();
         }
-        // A channel without keys says nothing unless it differs from what the object has anyway.
+        // A channel without keys is dropped unless it differs from the object's own value.
         if (channel.components.empty() || (!keyed && isStatic(channel)))
             return;
         if (!mDriven.emplace(channel.owner, channel.property).second)
@@ -188,7 +188,7 @@ std::vector<LegacyChannel> readChannels(LegacyObjects& objects, std::int64_t obj
             continue;
         if (child.value(0).toText() != "Transform")
             addNamed(objects, object, child, channels);
-        else if (!hasTransform) // damaged files nest or repeat it; the outermost first one counts
+        else if (!hasTransform) // damaged files nest or repeat it; the outermost first one is used
             addTransform(object, child, channels);
         hasTransform = hasTransform || child.value(0).toText() == "Transform";
     }

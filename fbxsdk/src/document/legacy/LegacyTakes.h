@@ -16,16 +16,16 @@ struct ChannelComponent {
     const Record* record = nullptr;
 };
 
-/// A channel and what it drives.
+/// A channel and its target.
 struct LegacyChannel {
     std::int64_t owner = 0;
     std::string_view property; ///< in the spelling of 7.x
     std::string_view nodeName; ///< "T", "R", "S" or the property's name
-    double scale = 1;          ///< from the file's unit to that of 7.x: percents of old visibilities
+    double scale = 1;          ///< factor from the file's unit to that of 7.x: percents of old visibilities
     std::vector<ChannelComponent> components;
 };
 
-/// All channels of an object's record, of the record itself or of what a take says about it.
+/// All channels of an object's record, of the record itself or of a take's record for it.
 [[nodiscard]] std::vector<LegacyChannel> readChannels(LegacyObjects& objects, std::int64_t object,
                                                       const Record& record);
 /// The static value of a component.

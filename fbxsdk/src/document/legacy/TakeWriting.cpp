@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A take lists what it moves, object by object, as channels within channels:
+// A take lists the objects that it animates, as channels within channels:
 //
 //     Model: "Model::x" { Channel: "Transform" { Channel: "T" { Channel: "X" { Default Key … } … } … } Channel: "Roll"
 //     … }
@@ -50,7 +50,7 @@ public:
     }
 
 private:
-    /// The Models that are driven, or hold an attribute that is.
+    /// The Models that are animated, or contain an attribute that is.
     [[nodiscard]] std::set<std::int64_t> modelsOf(const LegacyLayout::Driven& driven) const {
         std::set<std::int64_t> models;
         for (const auto& [id, properties] : driven) {
@@ -103,7 +103,7 @@ private:
         writeReal(mSink, "Version", 1.1);
     }
 
-    /// All three parts of the transform, whichever of them move.
+    /// All three parts of the transform, whichever of them are animated.
     void writeTransform(const DocumentObject& model, const std::vector<DrivenProperty>& properties) {
         const bool moves = std::any_of(properties.begin(), properties.end(),
                                        [](const DrivenProperty& driven) { return isTransform(driven.property); });

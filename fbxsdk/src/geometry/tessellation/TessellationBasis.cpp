@@ -31,12 +31,12 @@ public:
     [[nodiscard]] double slope(std::size_t term) const { return mSlopes[term]; }
 
 private:
-    /// Length of the support that function `term` of the degree below has inside this degree's recurrence.
+    /// Length of the support that function `term` of the next lower degree has inside this degree's recurrence.
     [[nodiscard]] double support(std::size_t span, std::size_t degree, std::size_t term) const {
         return mKnots[span + term + 1] - mKnots[span + term + 1 - degree];
     }
 
-    /// From the functions of the degree below to those of this degree.
+    /// From the functions of the next lower degree to those of this degree.
     void raise(std::size_t span, std::size_t degree, double parameter) {
         double saved = 0.0;
         for (std::size_t term = 0; term < degree; ++term) {
@@ -64,7 +64,7 @@ private:
     std::array<double, kHighestOrder> mSlopes{};
 };
 
-/// Index of the knot behind the last span.
+/// Index of the knot after the last span.
 std::size_t domainEnd(const KnotDirection& direction) {
     return direction.knots.size() - static_cast<std::size_t>(direction.order);
 }
@@ -74,7 +74,7 @@ bool isUsable(const KnotDirection& direction) {
         return false;
     const auto order = static_cast<std::size_t>(direction.order);
     const std::size_t fewest = static_cast<std::size_t>(direction.points) + order;
-    // At most the first order - 1 points come again.
+    // At most the first order - 1 points are repeated.
     if (direction.knots.size() < fewest || direction.knots.size() >= fewest + order)
         return false;
     const bool finite =
@@ -84,7 +84,7 @@ bool isUsable(const KnotDirection& direction) {
 }
 
 bool sameTerms(std::span<const BasisTerm> a, std::span<const BasisTerm> b, int points) {
-    // Both lists name neighbouring points; at a knot one of them may start a point later.
+    // Both lists refer to adjacent points; at a knot one of them may start a point later.
     std::vector<double> difference(static_cast<std::size_t>(points), 0.0);
     for (const BasisTerm& term : a)
         difference[static_cast<std::size_t>(term.point)] += term.weight;
@@ -93,13 +93,13 @@ bool sameTerms(std::span<const BasisTerm> a, std::span<const BasisTerm> b, int p
     return std::all_of(difference.begin(), difference.end(), [](double each) { return std::abs(each) < 1e-12; });
 }
 
-/// Where a direction runs round, its last sample is the first one, and shares its point.
+/// Where a direction is closed, its last sample is the first one, and shares its point.
 void join(SampledDirection& sampled) {
     sampled.joined = sampled.sampleCount() > 2 &&
                      sameTerms(sampled.termsOf(0), sampled.termsOf(sampled.sampleCount() - 1), sampled.points);
 }
 
-/// One segment of a patch: `width` points whose weights are cubics of the place within the segment.
+/// One segment of a patch: `width` points whose weights are cubics of the parameter within the segment.
 struct SegmentKind {
     int width;
     int stride;          ///< points from one segment to the next
@@ -125,8 +125,8 @@ BasisTerm termAt(const double (&coefficients)[4], int point, double t) {
             coefficients[1] + t * (2.0 * coefficients[2] + t * 3.0 * coefficients[3])};
 }
 
-/// Terms of a sample. A cardinal curve goes through its outer points as if it went straight on beyond them: the missing
-/// neighbour of an end mirrors the other one.
+/// Terms of a sample. A cardinal curve passes through its outer points as if it continued straight beyond them: the
+/// missing adjacent point of an end is the mirror image of the other one.
 void appendTerms(const FbxPatch::Direction& direction, int segment, double t, std::vector<BasisTerm>& terms) {
     const SegmentKind& kind = kindOf(direction);
     const bool mirrors = direction.type == FbxPatch::eCardinal && !direction.closed;
@@ -142,7 +142,7 @@ void appendTerms(const FbxPatch::Direction& direction, int segment, double t, st
     }
     if (!mirrors)
         return;
-    // Beyond an end stands 2 · end - neighbour; the clamped term has the end once.
+    // Beyond an end the point is 2 · end - adjacent; the clamped term has the end once.
     const auto reflect = [&](std::size_t beyond, std::size_t neighbour) {
         BasisTerm& outer = terms[start + beyond];
         terms[start + neighbour].weight -= outer.weight;

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// One parameter direction of a surface, sampled: which control points count how much for each sample, in value and in
-// slope. Everything a surface is made of (points, normals, skin weights, shapes) is a sum over these terms.
+// One parameter direction of a surface, sampled: the weights of control points for each sample, in value and in
+// slope. All data of a surface (points, normals, skin weights, shapes) are sums over these terms.
 #pragma once
 
 #include <cstddef>
@@ -15,12 +15,12 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Surfaces of a higher order are not tessellated: the cost grows with the square, and no writer goes near it.
+/// Surfaces of a higher order are not tessellated: the cost grows with the square, and no writer uses such orders.
 inline constexpr int kHighestOrder = 64;
 
 struct BasisTerm {
     int point = 0;       ///< control point of the direction
-    double weight = 0.0; ///< its share in the sample …
+    double weight = 0.0; ///< its weight in the sample …
     double slope = 0.0;  ///< … and the derivative of that by the parameter
 };
 
@@ -40,15 +40,15 @@ struct SampledDirection {
     }
 };
 
-/// A B-spline direction. The first points come again behind the last one: as many times as the knots ask for.
+/// A B-spline direction. The first points are repeated after the last one: as many times as the knots require.
 struct KnotDirection {
     int points = 0;
     int order = 0;
     std::span<const double> knots;
 };
 
-/// How many spans of the direction have a length; 0 when no curve can be made of it: an order below 2 or above the
-/// number of points, too few knots or too many, knots that descend or are no numbers.
+/// How many spans of the direction have a length; 0 when it defines no curve: an order below 2 or above the
+/// number of points, too few knots or too many, knots that descend or are not finite.
 [[nodiscard]] int spanCount(const KnotDirection& direction);
 /// That many equal steps in each span. Empty when there is no span.
 [[nodiscard]] std::optional<SampledDirection> sampleDirection(const KnotDirection& direction, int steps);
@@ -56,7 +56,7 @@ struct KnotDirection {
 /// The segments of a patch's direction; 0 when it has too few points for one.
 ///
 /// Linear, cardinal: from each point to the next. Bezier: from each third point to the next third (quadric: second),
-/// and points left over at the end count for nothing. B-spline: uniform; an open one stays short of its outer points.
+/// and points left over at the end are ignored. B-spline: uniform; an open one does not reach its outer points.
 [[nodiscard]] int segmentCount(const FbxPatch::Direction& direction);
 [[nodiscard]] std::optional<SampledDirection> sampleDirection(const FbxPatch::Direction& direction, int steps);
 

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A point of the mesh is a sum of control points with shares that add up to one. What skins and shapes do to the
-// control points, they do to the point in the same shares.
+// A point of the mesh is a sum of control points with weights that add up to one. The effect of skins and shapes on the
+// control points is applied to the point with the same weights.
 #include "geometry/tessellation/TessellationDeformers.h"
 
 #include <algorithm>
@@ -22,7 +22,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// The sums that points of the mesh get, with a record of which points got any.
+/// The sums for the points of the mesh, with a record of which points have any.
 template <class Number>
 class PointSums {
 public:
@@ -46,7 +46,7 @@ private:
     std::vector<bool> mTouched;
 };
 
-/// Where control points go: into shares of a grid's points, or, without a grid, each to the point of its own number.
+/// The destination of control points: weighted points of a grid, or, without a grid, each the point of its own number.
 class PointCarrier {
 public:
     PointCarrier(const FbxGeometry& from, const FbxMesh& mesh, const TessellationGrid* grid)
@@ -61,7 +61,7 @@ public:
                 to.AddControlPointIndex(from.GetControlPointIndices()[i], from.GetControlPointWeights()[i]);
             return;
         }
-        // A control point that is listed twice is spread once.
+        // A control point that is listed twice is distributed once.
         PointSums<double> weights(mGrid->controlPointCount());
         for (int i = 0; i < count; ++i) {
             const int point = from.GetControlPointIndices()[i];
@@ -100,7 +100,7 @@ private:
     const TessellationGrid* mGrid;
 };
 
-/// A new object of the same class beside an object, with the same name and properties.
+/// A new object of the same class as an object, with the same name and properties.
 template <class T>
 T* newLike(const T& object) {
     T* made = T::Create(object.GetFbxManager(), object.GetName());
@@ -167,7 +167,7 @@ void carryAll(FbxMesh& mesh, const FbxGeometry& from, const PointCarrier& carrie
     }
 }
 
-/// What a deformer consists of; links are none of it.
+/// The parts of a deformer; links are not among them.
 void destroyParts(FbxDeformer& deformer) {
     if (auto* skin = FbxCast<FbxSkin>(&deformer)) {
         while (FbxCluster* cluster = skin->GetCluster(0))

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Skins and shapes of a surface for the mesh that is made of it.
+// Skins and shapes of a surface for the mesh that replaces it.
 #pragma once
 
 #include <fbxsdk/FbxMesh.h>
@@ -15,12 +15,12 @@ namespace detail {
 [[nodiscard]] std::int64_t numbersPerPoint(const FbxGeometry& geometry);
 
 /// Gives the mesh deformers of its own, which move its points as those of the surface moved the surface: clusters with
-/// the same links and bindings, channels with the same curves. Point caches are about points that are gone.
+/// the same links and bindings, channels with the same curves. Point caches do not apply: their points no longer exist.
 void carryDeformers(FbxMesh& mesh, const FbxGeometry& surface, const TessellationGrid& grid);
-/// The same for a mesh that has the geometry's own points. Point caches then go for both.
+/// The same for a mesh that has the geometry's own points. Point caches then apply to both.
 void carryDeformers(FbxMesh& mesh, const FbxGeometry& samePoints);
 
-/// Destroys the deformers that deform nothing but this geometry, with their clusters, channels and shapes.
+/// Destroys the deformers of this geometry only, with their clusters, channels and shapes.
 void destroyDeformers(FbxGeometry& geometry);
 
 /// Values, dynamic properties and animation of the properties that the object has set.

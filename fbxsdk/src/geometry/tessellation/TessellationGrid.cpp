@@ -42,7 +42,7 @@ bool isFinite(const Vector& point) {
     return std::isfinite(point[0]) && std::isfinite(point[1]) && std::isfinite(point[2]);
 }
 
-/// The direction of a derivative. Where it vanishes, as at the pole of a sphere, that of the nearby ones: they grow
+/// The direction of a derivative. Where it vanishes, as at the pole of a sphere, that of the adjacent ones: they grow
 /// with the mixed derivative on the way inwards, which leads up at the start of the other direction and down at its
 /// end.
 Vector directionOf(const Vector& derivative, const Vector& mixed, double scale, double place) {
@@ -102,7 +102,7 @@ public:
 
 private:
     std::vector<Vector> mPoints, mSlopes;
-    std::vector<std::size_t> mUsed; ///< those that any sample has a share of: knots may leave most of them out
+    std::vector<std::size_t> mUsed; ///< those with a weight in any sample: knots may exclude most of them
 };
 
 std::optional<std::pair<int, int>> stepsWithin(int spansU, int spansV, int stepU, int stepV, std::int64_t budget) {
@@ -181,13 +181,13 @@ std::optional<SampledSurface> sampleGeometry(const FbxGeometry& geometry, std::i
     return sampleNurbs(surface, sampleBudget(controlPoints, shares, numbersPerPoint, fewest));
 }
 
-/// Whether the numbers of control points go together.
+/// Whether the counts of control points and knots match.
 bool fits(const SampledSurface& sampled, const FbxGeometry& geometry) {
     return geometry.GetControlPoints() &&
            std::int64_t{sampled.u.points} * sampled.v.points == std::int64_t{geometry.GetControlPointsCount()};
 }
 
-/// Whether every sample is a mean of control points: shares that are not negative and add up to about 1.
+/// Whether every sample is a mean of control points: weights that are not negative and add up to about 1.
 bool isBlend(const SampledDirection& direction) {
     for (int sample = 0; sample < direction.sampleCount(); ++sample) {
         double sum = 0.0;
@@ -202,7 +202,7 @@ bool isBlend(const SampledDirection& direction) {
     return true;
 }
 
-/// Whether no mean of the points can be without a finite place.
+/// Whether every mean of the points is finite.
 bool areModerate(const Vector* points, const SampledSurface& surface) {
     constexpr double kLargest = 1e90, kSmallestWeight = 1e-90;
     return std::all_of(points, points + std::ptrdiff_t{surface.u.points} * surface.v.points, [&](const Vector& point) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A grid of samples over a surface: points, normals, and the shares that control points have in each of them.
+// A grid of samples over a surface: points, normals, and the weights of control points in each of them.
 #pragma once
 
 #include <cstdint>
@@ -20,26 +20,26 @@ namespace detail {
 
 /// A surface that has more samples with single steps is not tessellated.
 inline constexpr std::int64_t kMostSamples = std::int64_t{1} << 22;
-/// Every control point is good for so many samples: eight steps both ways.
+/// The sample budget of a control point: eight steps both ways.
 inline constexpr std::int64_t kSamplesPerControlPoint = 64;
-/// A surface of few control points may have so many all the same …
+/// The minimum budget of a surface with few control points …
 inline constexpr std::int64_t kSamplesOfAnySurface = std::int64_t{1} << 14;
-/// … as long as those of all surfaces of a scene, beyond what their control points are good for, are not more than
+/// … as long as all surfaces of a scene together, beyond the budget of their control points, do not exceed
 /// this.
 inline constexpr std::int64_t kSamplesOfAnyScene = std::int64_t{1} << 19;
 
-/// How many samples a surface may have before its steps are made coarser. What a file costs stays in proportion to what
-/// stands in it: to its control points, and to the numbers that deformers will need for each sample.
+/// How many samples a surface may have before its steps are made coarser. The cost of a file stays in proportion to its
+/// content: to its control points, and to the numbers that deformers will need for each sample.
 [[nodiscard]] std::int64_t sampleBudget(std::int64_t controlPoints, std::int64_t sharesPerSample,
                                         std::int64_t numbersPerPoint, std::int64_t fewest = kSamplesOfAnySurface);
 
-/// What the samples of a surface will be.
+/// The properties of a surface's samples before they are computed.
 struct TessellationPlan {
     std::int64_t samples = 0;
-    bool coarser = false;        ///< than the surface asks for
-    bool certainlyFinite = true; ///< no sample can turn out to have no finite place
+    bool coarser = false;        ///< than the surface specifies
+    bool certainlyFinite = true; ///< every sample is finite
 };
-/// The plan by which TessellationGrid::of samples the surface; empty when it has none for certain.
+/// The plan by which TessellationGrid::of samples the surface; empty when it certainly has none.
 [[nodiscard]] std::optional<TessellationPlan> planTessellation(const FbxGeometry& geometry,
                                                                std::int64_t numbersPerPoint, std::int64_t fewest);
 
@@ -49,14 +49,14 @@ struct TessellationPlan {
 /// u runs fastest, in control points and in samples.
 class TessellationGrid {
 public:
-    /// Samples a NURBS surface or a patch; null for other geometry and for one that has no surface: numbers that do not
-    /// fit together, or samples without a finite place. `numbersPerPoint` is what deformers will add.
+    /// Samples a NURBS surface or a patch; null for other geometry and for inconsistent data: numbers that do not
+    /// match, or samples that are not finite. `numbersPerPoint` is the count that deformers will add.
     [[nodiscard]] static std::unique_ptr<TessellationGrid> of(const FbxGeometry& geometry, std::int64_t numbersPerPoint,
                                                               std::int64_t fewest = kSamplesOfAnySurface);
 
     [[nodiscard]] const SampledDirection& u() const { return mU; }
     [[nodiscard]] const SampledDirection& v() const { return mV; }
-    /// Whether the surface's front is the side that du × dv points away from.
+    /// Whether the surface's front is the side opposite to du × dv.
     [[nodiscard]] bool flipped() const { return mFlipped; }
 
     /// Joined samples are one point.
@@ -69,8 +69,8 @@ public:
     /// One per sample, of length 1 on the surface's front; zero where the surface has no direction.
     [[nodiscard]] std::span<const FbxVector4> normals() const { return mNormals; }
 
-    /// Adds what control points have, `size` numbers each, to the points they have a share in, times the share.
-    /// Takes one control point at a time, so that few of them cost little.
+    /// Adds the numbers of control points, `size` each, to the points in which they have a weight, times the weight.
+    /// Takes one control point at a time, so that the cost is proportional to their number.
     template <class Add>
     void spread(int controlPoint, Add&& add) const {
         const int columns = mU.points;
@@ -85,7 +85,7 @@ public:
     [[nodiscard]] int controlPointCount() const { return mU.points * mV.points; }
 
 private:
-    /// The samples that one control point of a direction counts in.
+    /// The samples in which one control point of a direction has a weight.
     struct Share {
         int sample;
         double weight;

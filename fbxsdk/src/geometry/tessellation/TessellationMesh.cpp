@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Cells become triangles that run counter-clockwise seen from the surface's front.
+// Cells become triangles that are counter-clockwise seen from the surface's front.
 #include "geometry/tessellation/TessellationMesh.h"
 
 #include <algorithm>
@@ -12,7 +12,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
 
-/// Calls for each corner of each triangle, in order, with its sample's place in the grid.
+/// Calls for each corner of each triangle, in order, with the index of its sample in the grid.
 template <class Visit>
 void visitCorners(const TessellationGrid& grid, Visit visit) {
     //  3---2
@@ -42,7 +42,7 @@ void fillPolygons(FbxMesh& mesh, const TessellationGrid& grid) {
         starts[polygon] = 3 * polygon;
 }
 
-/// What the surface has no direction for, as at the tip of a cusp, takes the direction of the triangle; zero when the
+/// Points where the surface has no normal, as at the tip of a cusp, take that of the triangle; zero when the
 /// triangle has none either.
 FbxVector4 triangleNormal(const FbxMesh& mesh, int corner) {
     const int* vertices = mesh.GetPolygonVertices() + corner / 3 * 3;
@@ -108,7 +108,7 @@ void carryMaterial(FbxMesh& mesh, FbxGeometry& surface) {
 }
 
 MeshOfSurface::~MeshOfSurface() {
-    if (!surface.GetFbxManager()->data().tearingDown) // which frees it by itself
+    if (!surface.GetFbxManager()->data().tearingDown) // which frees it anyway
         surface.Destroy();
 }
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From a grid of samples to a mesh of triangles.
+// Conversion of a grid of samples to a mesh of triangles.
 #pragma once
 
 #include <cstdint>
@@ -13,8 +13,8 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// A surface that a mesh has taken the place of, to be sampled when somebody asks for the mesh's polygons. It belongs
-/// to nobody else any more.
+/// A surface that a mesh has replaced, to be sampled when the mesh's polygons are first accessed. The mesh is its only
+/// owner.
 struct MeshOfSurface {
     explicit MeshOfSurface(FbxGeometry& geometry, std::int64_t fewestSamples)
         : surface(geometry), fewest(fewestSamples) {}
@@ -23,7 +23,7 @@ struct MeshOfSurface {
     ~MeshOfSurface();
 
     FbxGeometry& surface;
-    const std::int64_t fewest; ///< samples that its few control points do not limit it to
+    const std::int64_t fewest; ///< minimum budget of samples, however few control points it has
 };
 
 /// Fills a mesh with the polygons and the material of the surface. False when it has no samples.

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Each triangle knows its polygon, and each of its corners the corner of the polygon: layers are carried by these maps.
+// Each triangle stores its polygon, and each of its corners the polygon's corner: layers are converted by these maps.
 #include "geometry/tessellation/TessellationTriangles.h"
 
 #include <algorithm>
@@ -16,7 +16,7 @@ namespace {
 using Access = LayerElementAccess;
 using Element = FbxLayerElement;
 
-/// Where the triangles come from.
+/// The origin of the triangles.
 struct Origins {
     std::vector<int> corners;  ///< for each corner of each triangle
     std::vector<int> polygons; ///< for each triangle
@@ -45,7 +45,7 @@ void fillPolygons(FbxMesh& triangles, const FbxMesh& mesh, const Origins& origin
         starts[i] = 3 * i;
 }
 
-/// The entries at the places, in their order; without places all of them.
+/// The entries at the indices, in their order; without indices all of them.
 template <class T>
 void pick(FbxLayerElementArrayTemplate<T>& to, const FbxLayerElementArrayTemplate<T>& from,
           const std::vector<int>* places) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes of polygons become meshes of triangles.
+// Conversion of meshes of polygons to meshes of triangles.
 #pragma once
 
 #include <fbxsdk/FbxMesh.h>
@@ -9,8 +9,8 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-/// Fills a new mesh with the points of another one and its polygons cut into fans around their first corners; polygons
-/// of fewer than three corners are left out. Layers come along, but for what belongs to edges.
+/// Fills a new mesh with the points of another one and its polygons split into fans around their first corners;
+/// polygons of fewer than three corners are omitted. Layers are converted as well, except for elements by edge.
 void fillTriangles(FbxMesh& triangles, FbxMesh& polygons);
 
 } // namespace detail
