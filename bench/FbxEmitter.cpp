@@ -6,7 +6,7 @@
 //     end offset  value count  value bytes  name length  name  values  [records, 13 zero bytes]
 //     u32         u32          u32          u8
 //
-// of which the numbers are known at its end and patched then. The whole file stands in memory until it is saved.
+// of which the sizes are known at its end and patched then. The whole file is in memory until it is saved.
 #include "FbxEmitter.h"
 
 #include <libdeflate.h>

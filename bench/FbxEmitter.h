@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A minimal writer of FBX 7.4 records for benchmark inputs, binary or ASCII. It knows nothing of the library, so that
+// A minimal writer of FBX 7.4 records for benchmark inputs, binary or ASCII. It is independent of the library, so that
 // no error of the library's own writer can make its inputs easy to read.
 #pragma once
 

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Counting allocations: the program's own malloc and its like, which the shared libraries call as well, stand before
-// those of the C library. Counting instructions: requests to valgrind, which do nothing outside of it.
+// Counting allocations: the program's own malloc and related functions, which the shared libraries call as well,
+// replace those of the C library. Counting instructions: requests to valgrind, which do nothing outside of it.
 #include "Measurement.h"
 
 #include <atomic>

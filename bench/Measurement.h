@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a benchmark program prints for the scripts: the answer, to be proven equal, and what it cost.
+// What a benchmark program prints for the scripts: the result, to be compared, and its cost.
 #pragma once
 
 #include <algorithm>
@@ -13,7 +13,7 @@
 
 namespace bench {
 
-/// A read's answer: how many things, and the box around their numbers.
+/// A read's result: how many objects, and their bounding box.
 struct Answer {
     long long count = 0;
     std::array<double, 3> minimum = {kMost, kMost, kMost};
@@ -31,16 +31,17 @@ private:
     static constexpr double kMost = std::numeric_limits<double>::max();
 };
 
-/// What one call cost.
+/// The cost of one call.
 struct Cost {
     double seconds = std::numeric_limits<double>::infinity();
-    std::uint64_t allocations = 0; ///< calls of malloc, calloc, realloc and their like, by anything in the process
+    std::uint64_t allocations = 0; ///< calls of malloc, realloc and related functions, by anything in the process
 };
 
-/// Allocations of the process so far. The benchmark programs define malloc and its like for this (Allocations.cpp).
+/// Allocations of the process so far. The benchmark programs define malloc and related functions for this
+/// (Allocations.cpp).
 std::uint64_t allocationCount();
 
-/// From here to the end of the scope, valgrind's callgrind counts instructions; without it nothing happens.
+/// From here to the end of the scope, valgrind's callgrind counts instructions; without it there is no effect.
 class CountedInstructions {
 public:
     CountedInstructions();
@@ -59,7 +60,7 @@ private:
     std::chrono::steady_clock::time_point mStart = std::chrono::steady_clock::now();
 };
 
-/// The cost of the work, from its start to its end.
+/// The cost of the work, from start to end.
 template <class Work>
 Cost measure(const Work& work) {
     const std::uint64_t allocated = allocationCount();
@@ -71,7 +72,7 @@ Cost measure(const Work& work) {
     return {watch.seconds(), allocationCount() - allocated};
 }
 
-/// The less expensive of two runs of the same work: the machine only ever adds to what it takes.
+/// The less expensive of two runs of the same work: noise only ever adds to the cost.
 inline Cost cheaper(const Cost& a, const Cost& b) { return a.seconds <= b.seconds ? a : b; }
 
 inline void print(const Cost& cost) {

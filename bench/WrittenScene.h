@@ -20,7 +20,7 @@ struct Grid {
     int quads() const { return columns * rows; }
     int points() const { return (columns + 1) * (rows + 1); }
 
-    /// The place of a point in the grid, row by row.
+    /// The position of a point in the grid, row by row.
     std::array<float, 3> point(int index) const {
         const auto x = static_cast<float>(index % (columns + 1)), z = static_cast<float>(index / (columns + 1));
         return {x * 0.1f, std::sin(x * 0.013f) * std::cos(z * 0.017f) * 7.0f, z * 0.1f};

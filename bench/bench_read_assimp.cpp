@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Reads the same file with assimp, without any post-processing, and prints the same answer and the time.
+// Reads the same file with assimp, without any post-processing, and prints the same result and the time.
 #include "Measurement.h"
 
 #include <assimp/Importer.hpp>
@@ -11,7 +11,7 @@
 
 namespace {
 
-/// Polygon vertices and the box around the points, in the mesh's own space.
+/// Polygon vertices and the bounding box of the points, in the mesh's own space.
 void addMeshes(const aiScene& scene, bench::Answer& answer) {
     for (unsigned i = 0; i < scene.mNumMeshes; ++i) {
         const aiMesh& mesh = *scene.mMeshes[i];
@@ -34,7 +34,7 @@ void addCameras(const aiScene& scene, bench::Answer& answer) {
     }
 }
 
-/// The channels that move a node, and the box around their keys.
+/// The channels that move a node, and the bounding box of their keys.
 void addTransforms(const aiScene& scene, bench::Answer& answer) {
     for (unsigned i = 0; i < scene.mNumAnimations; ++i) {
         for (unsigned c = 0; c < scene.mAnimations[i]->mNumChannels; ++c) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Reads one file as a host does, through the facade, and prints the answer and the time.
+// Reads one file as a host does, through the facade, and prints the result and the time.
 #include "Measurement.h"
 
 #include <Fbx.h>
@@ -23,11 +23,11 @@ using namespace Tarnell::Fbx;
 TnFbxReadInfo infoFor(const char* fileName) {
     TnFbxReadInfo info;
     info.setFileName(fileName);
-    info.setAnimationStackName("any"); // only has to be there
+    info.setAnimationStackName("any"); // only must not be empty
     return info;
 }
 
-/// Polygon vertices and the box around the points, in the mesh's own space.
+/// Polygon vertices and the bounding box of the points, in the mesh's own space.
 bool readMeshes(const char* fileName, bench::Answer& answer, bench::Cost& cost) {
     TnFbxReadInfo info = infoFor(fileName);
     info.setTransformPoints(false);
@@ -47,7 +47,7 @@ bool readMeshes(const char* fileName, bench::Answer& answer, bench::Cost& cost) 
     return success;
 }
 
-/// The file's own cameras (the library adds seven viewing cameras) and the box around their positions.
+/// The file's own cameras (the library adds seven viewing cameras) and the bounding box of their positions.
 bool readCameras(const char* fileName, bench::Answer& answer, bench::Cost& cost) {
     constexpr int kProducerCameras = 7;
     TnFbxReadInfo info = infoFor(fileName);
@@ -68,7 +68,7 @@ bool readCameras(const char* fileName, bench::Answer& answer, bench::Cost& cost)
     return success;
 }
 
-/// The nodes, and the box around their positions at the frames that carry keys.
+/// The nodes, and the bounding box of their positions at the frames with keys.
 bool readTransforms(const char* fileName, bool global, bench::Answer& answer, bench::Cost& cost) {
     constexpr int kFramesPerKey = 5;
     TnFbxReadInfo info = infoFor(fileName);

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Reads the same file with ufbx and lets it do the same work: samples at whole frames where ours hands out samples.
-// UFBX_THREADS=N lets it inflate and parse with N threads.
+// Reads the same file with ufbx and makes it do the same work: samples at whole frames where ours returns samples.
+// UFBX_THREADS=N makes it inflate and parse with N threads.
 #include "Measurement.h"
 
 #include "ufbx.h"
@@ -71,7 +71,7 @@ std::vector<float> sampleLocal(const ufbx_scene& scene, const Frames& frames) {
     return samples;
 }
 
-/// The same in the world: parents before children, each matrix taken apart again.
+/// The same in the world: parents before children, each matrix decomposed again.
 std::vector<float> sampleWorld(const ufbx_scene& scene, const Frames& frames) {
     std::vector<float> samples(scene.nodes.count * kChannels * frames.count);
     std::vector<ufbx_matrix> world(scene.nodes.count);
@@ -112,7 +112,7 @@ void addCameras(const ufbx_scene& scene, bench::Answer& answer) {
     }
 }
 
-/// The nodes below the root, and the box around their positions at the frames that carry keys.
+/// The nodes below the root, and the bounding box of their positions at the frames with keys.
 void addSamples(const ufbx_scene& scene, const Frames& frames, const std::vector<float>& samples,
                 bench::Answer& answer) {
     constexpr std::size_t kFramesPerKey = 5;

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Deforms a skinned mesh frame by frame as a host does, and holds the time against the memory traffic that the work
-// cannot do without. The points are proven right before a time counts.
+// Deforms a skinned mesh frame by frame as a host does, and compares the time with the minimum memory traffic of the
+// work. The points are verified before a time counts.
 #include "Measurement.h"
 
 #include <FbxSdk.h>
@@ -31,7 +31,7 @@ constexpr double kTolerance = 1e-9; // of coordinates that stay below 1000
 
 using Place = std::array<double, 3>;
 
-/// How one vertex hangs on its bones. The weights do not add up to 1: normalising is part of the work.
+/// The influences of the bones on one vertex. The weights do not add up to 1: normalising is part of the work.
 struct Binding {
     std::array<int, kInfluences> bones;
     std::array<double, kInfluences> weights;
@@ -63,7 +63,7 @@ Skin makeSkin() {
 
 // ---- The bones, as numbers ----
 
-/// Where a bone stands when it is bound.
+/// The bind position of a bone.
 Place boneOrigin(int bone) {
     return {static_cast<double>(bone % 10) * 10.0, static_cast<double>(bone / 10) * 16.0, 50.0};
 }
@@ -72,7 +72,7 @@ Place boneOrigin(int bone) {
 float boneTurn(int bone, int frame) { return static_cast<float>(frame) * (0.25f + static_cast<float>(bone) / 64.0f); }
 float boneRise(int bone, int frame) { return static_cast<float>(frame * (bone % 5)) / 32.0f; }
 
-/// The closed form: the turn about the bone's Z and its rise, averaged by weight.
+/// The closed form: the rotation about the bone's Z and its rise, averaged by weight.
 Place expectedPlace(const Place& point, const Binding& binding, int frame) {
     Place sum{};
     double total = 0.0;
@@ -145,7 +145,7 @@ void addSkin(fbxsdk::FbxScene* scene, fbxsdk::FbxMesh* mesh, fbxsdk::FbxAnimLaye
     mesh->AddDeformer(deformer);
 }
 
-/// The node with the skinned mesh; null when the context does not come up.
+/// The node with the skinned mesh; null when the context cannot be initialised.
 fbxsdk::FbxNode* buildScene(Tarnell::Fbx::FbxSdk& sdk, const Skin& skin, const std::vector<int>& order) {
     if (!sdk.initFbxSdkManager()) {
         return nullptr;
@@ -187,7 +187,7 @@ public:
         return watch.seconds();
     }
 
-    /// Whether every vertex of the frame deformed last is where the closed form says.
+    /// Whether every vertex of the frame deformed last is where the closed form has it.
     [[nodiscard]] bool isRight(int frame) const {
         for (std::size_t i = 0; mPoints != nullptr && i < mSkin.points.size(); ++i) {
             const Place expected = expectedPlace(mSkin.points[i], mSkin.bindings[i], frame);
@@ -203,7 +203,7 @@ public:
         return mPoints != nullptr;
     }
 
-    /// Adds the bits of the frame deformed last to a number that changes with any of them (FNV-1a).
+    /// Adds the bits of the frame deformed last to a hash (FNV-1a).
     [[nodiscard]] std::uint64_t digest(std::uint64_t value) const {
         for (int i = 0; i < kVertices; ++i) {
             for (int axis = 0; axis < 4; ++axis) {
@@ -223,7 +223,7 @@ private:
 /// Bytes per second, read and written together, of the best of some copies of an array larger than the caches.
 double copyBandwidth() {
     constexpr std::size_t kSize = std::size_t{256} << 20;
-    constexpr int kRounds = 6; // the first one only brings the pages in
+    constexpr int kRounds = 6; // the first one only maps the pages
     std::vector<unsigned char> from(kSize, 1), to(kSize, 2);
     double best = std::numeric_limits<double>::max();
     for (int round = 0; round < kRounds; ++round) {
@@ -235,9 +235,9 @@ double copyBandwidth() {
     return to[0] == 3 ? 2.0 * static_cast<double>(kSize) / best : 0.0;
 }
 
-/// The traffic of one frame that no way of working can avoid, in bytes: each control point (4 doubles) is read once,
+/// The minimum traffic of one frame in bytes: each control point (4 doubles) is read once,
 /// each influence is read once (an index of 4 bytes, a weight of 8), each deformed point is written once. Matrices,
-/// sums of weights and points in work are taken to stay in the cache, and so are the bones.
+/// sums of weights and points in progress are assumed to stay in the cache, and so are the bones.
 constexpr double leastTraffic() {
     constexpr double kPoint = sizeof(fbxsdk::FbxVector4);
     constexpr double kInfluence = sizeof(int) + sizeof(double);
@@ -266,7 +266,7 @@ void print(std::vector<double> seconds, double bandwidth, std::uint64_t digest) 
                 median / (trafficWithSums() / bandwidth));
 }
 
-/// The vertices in the order of their numbers, as files mostly have them, or thoroughly mixed.
+/// The vertices in the order of their numbers, as in most files, or thoroughly mixed.
 std::vector<int> vertexOrder(bool mixed) {
     std::vector<int> order(kVertices);
     std::iota(order.begin(), order.end(), 0);

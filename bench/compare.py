@@ -29,7 +29,7 @@ from pathlib import Path
 BOX_TOLERANCE = 1e-4
 # Smaller files measure the start of a program.
 SMALLEST_CORPUS_FILE = 1024
-# Clips that last for days, which nobody samples, and places that are no numbers, which have no box around them.
+# Clips that last for days, which are not sampled, and positions that are not finite, which have no bounding box.
 LEFT_OUT = ("huge", "long_key", "nan")
 BEGIN_MARK, END_MARK = "<!-- measured: begin -->", "<!-- measured: end -->"
 
@@ -40,7 +40,7 @@ class Workload:
     file: str
     mode: str
     peer: str
-    goal: str = ""  # what docs/benchmarks.md promises
+    goal: str = ""  # the goal in docs/benchmarks.md
 
 
 WORKLOADS = [
@@ -95,7 +95,7 @@ class Run:
 
 
 def run(program: Path, mode: str, file: Path, *more: str, quiet: bool = False) -> Run | None:
-    """One process: its answer, what it took by itself, and its peak of resident memory. None, when quiet, for a file
+    """One process: its result, its own time, and its peak of resident memory. None, when quiet, for a file
     that it refuses."""
     process = subprocess.Popen([program, mode, file, *more], stdout=subprocess.PIPE, text=True,
                                stderr=subprocess.DEVNULL if quiet else None)

@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-"""Compares two builds of ours, run in turn: the median of the ratios of neighbouring runs, new over old.
+"""Compares two builds of ours, run in turn: the median of the ratios of adjacent runs, new over old.
 
 A slow-down of a few per cent disappears in the noise of separate measurements; in pairs it shows.
 

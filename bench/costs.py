@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-"""Counts the instructions and allocations of small workloads and holds them against costs.json.
+"""Counts the instructions and allocations of small workloads and compares them with costs.json.
 
 Neither depends on how busy the machine is: more than 5 per cent above the recorded number is a change of ours. Whoever
 means it records the new numbers with --update, and says why in the commit.

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Writes the inputs of the benchmarks into a folder. Everything comes from one seed: the same program writes the same
+// Writes the inputs of the benchmarks into a folder. Everything is generated from one seed: the same program writes the
 // files everywhere.
 //
 //     generate_inputs FOLDER [SCALE]     SCALE 0.01 makes small ones, to try the programs
@@ -37,7 +37,7 @@ constexpr int kRigNodes = 156;
 constexpr int kRigControls = 5; // of a node: scalar properties with a curve each
 constexpr int kRigKeys = 33;
 
-/// The same numbers with every standard library, which its distributions do not promise.
+/// The same numbers with every standard library, which its distributions do not guarantee.
 class Random {
 public:
     /// In [−1, 1).
@@ -50,7 +50,7 @@ private:
     std::mt19937_64 mEngine{kSeed};
 };
 
-/// Collects connections while objects are written, and hands out ids.
+/// Collects connections while objects are written, and assigns ids.
 struct Scene {
     FbxEmitter& out;
     Random random{};
@@ -229,7 +229,7 @@ void writeMeshFile(const std::filesystem::path& path, Encoding encoding, int mes
     out->save(path);
 }
 
-// ---- Animation: chains of ten nodes side by side, all turning and moving ----
+// ---- Animation: chains of ten nodes side by side, all rotating and moving ----
 
 void writeStack(Scene& scene, std::int64_t layer, std::int64_t ticks) {
     FbxEmitter& out = scene.out;

@@ -3,7 +3,7 @@ include(CMakePackageConfigHelpers)
 
 set(package_folder "${CMAKE_INSTALL_LIBDIR}/cmake/TarnellFbx")
 
-# Wherever it is installed, the library finds the platform beside it, and the tool finds both.
+# Wherever it is installed, the library finds the platform next to it, and the tool finds both.
 file(RELATIVE_PATH programs_to_libraries "${CMAKE_INSTALL_FULL_BINDIR}" "${CMAKE_INSTALL_FULL_LIBDIR}")
 if(NOT TARNELL_FBXSDK_ROOT)
   set_target_properties(tarnell-fbx PROPERTIES INSTALL_RPATH "$ORIGIN")

@@ -5,7 +5,7 @@
 function(tarnell_precompile name)
   target_precompile_headers(${name} PRIVATE ${ARGN})
   if(CMAKE_CXX_COMPILER_ID MATCHES "Clang")
-    # A header that was read anew from the same text is the same, for ccache too.
+    # For ccache, a header that was rewritten with the same text is unchanged.
     target_compile_options(${name} PRIVATE "SHELL:-Xclang -fno-pch-timestamp")
   endif()
 endfunction()
@@ -34,7 +34,7 @@ function(tarnell_count_steps name)
   endif()
 endfunction()
 
-# A shared library exports what cmake/NAME.map lets through.
+# A shared library exports what cmake/NAME.map lists.
 function(tarnell_export name)
   set(map "${PROJECT_SOURCE_DIR}/cmake/${name}.map")
   target_link_options(${name} PRIVATE "LINKER:--version-script=${map}")

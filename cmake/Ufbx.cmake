@@ -1,5 +1,5 @@
-# ufbx, an independent reader that benchmarks and tests run beside ours. It is not packaged: its sources are looked for in
-# the folder that TARNELL_PEERS names, else beside the project. Where they are, there is a target `ufbx`.
+# ufbx, an independent reader for comparison in benchmarks and tests. It is not packaged: its sources are looked for in
+# the folder that TARNELL_PEERS names, else next to the project. Where they are, there is a target `ufbx`.
 set(peers "$ENV{TARNELL_PEERS}")
 if(NOT peers)
   set(peers "${PROJECT_SOURCE_DIR}/../shared/peers")

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Prints one line per frame of a named camera: position, rotation, focal length. What a renderer or a matchmove tool
-// would feed its own camera with.
+// Prints one line per frame of a named camera: position, rotation, focal length. The input that a renderer or a
+// matchmove tool needs for its own camera.
 #include <cstdio>
 #include <memory>
 

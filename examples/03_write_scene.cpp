@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Builds a shot from nothing and writes it: a camera that moves and zooms, a spot light, two nulls and a waving sheet
-// whose points go into a point cache beside the file. What a tracking or layout program would hand to the next one.
+// Builds a new shot and writes it: a camera that moves and zooms, a spot light, two nulls and a waving sheet
+// whose points go into a point cache next to the file. What a tracking or layout program passes to the next one.
 #include <algorithm>
 #include <cmath>
 #include <cstdio>
@@ -144,7 +144,7 @@ int main(int argc, char** argv) {
         return 1;
     }
     if (isGiven("--values"))
-        printCamera(camera); // what went in, to be held against what is read
+        printCamera(camera); // the written values, for comparison with what is read
     else
         std::printf("wrote %s\n", argv[1]);
     return 0;

@@ -57,7 +57,7 @@ class Batches:
 
 
 def clashing(options, path, sources):
-    """Those of the sources, but for the first, that cannot be compiled after the others."""
+    """Those of the sources, except the first, that cannot be compiled after the others."""
     command = f"{options} -fsyntax-only -w -ferror-limit=0 {path}"
     result = subprocess.run(command, shell=True, capture_output=True, text=True, check=False)
     wrong = {Path(name) for name in ERROR.findall(result.stderr)}
@@ -78,8 +78,8 @@ def together(batches, options, sources):
 
 
 def tidy(database, path):
-    """What clang-tidy finds, and whether that is nothing."""
-    # A source that includes sources is what we want here.
+    """The output of clang-tidy, and whether there are no findings."""
+    # A source that includes sources is intended here.
     command = [TIDY, "-p", str(database), "--config-file=.clang-tidy", "--checks=-bugprone-suspicious-include",
                "--quiet", "--warnings-as-errors=*", str(path)]
     result = subprocess.run(command, capture_output=True, text=True, check=False)

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The limit on what one call hands out, and the account that is held against it.
+// The limit on the memory of one call's results, and the account that is checked against it.
 #include "calls/MemoryLimit.h"
 
 #include "TnFbxLimits.h"

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What people read of texts that strangers wrote.
+// The display form of untrusted texts.
 #include "calls/Printable.h"
 
 #include <gtest/gtest.h>

@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-"""Builds the API reference of a product, and holds the number of its undocumented symbols against the recorded one.
+"""Builds the API reference of a product, and compares the number of its undocumented symbols with the recorded one.
 
 Usage: api_docs.py PRODUCT SCRATCH_FOLDER    what ctest runs; fails when there are more than recorded, or fewer
        api_docs.py PRODUCT --list            all of them, as FILE:LINE: SYMBOL
@@ -31,7 +31,7 @@ def is_public(element):
 
 
 def speaks_for_itself(member):
-    """Destructors, and what the language makes or leaves out."""
+    """Destructors, and defaulted or deleted members."""
     arguments = member.findtext("argsstring") or ""
     return member.findtext("name").startswith("~") or arguments.endswith(("=default", "=delete"))
 

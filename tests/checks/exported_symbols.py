@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-"""Holds what a shared library exports against its public headers.
+"""Compares the exports of a shared library with its public headers.
 
 Usage: exported_symbols.py LIBRARY_FILE PRODUCT COMPILER
 
@@ -120,7 +120,7 @@ def exported_symbols(library):
 
 
 def symbols_called_by_headers(product, compiler, folder):
-    """What the functions that the product's headers define call of the product; nothing where the compiler cannot tell."""
+    """The product's functions that inline functions of its headers call; nothing where the compiler lists none."""
     headers = ROOT / HEADERS[product]
     source, target = Path(folder) / "headers.cpp", Path(folder) / "headers.o"
     names = sorted(str(path.relative_to(headers)) for path in headers.rglob("*.h"))

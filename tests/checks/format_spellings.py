@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-"""Fails when a spelling of the format stands beside the table that readers and writers share.
+"""Fails when a spelling of the format occurs outside of the table that readers and writers share.
 
 Usage: format_spellings.py PROJECT_ROOT
 

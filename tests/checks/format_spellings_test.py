@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-"""Shows which literals format_spellings.py refuses and which it lets pass."""
+"""Shows which literals format_spellings.py refuses and which it accepts."""
 
 import tempfile
 import unittest

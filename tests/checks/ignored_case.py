@@ -30,7 +30,7 @@ HOSTS = {
 
 
 def ignore_case(folder, names):
-    """Links each name to the file that differs from it by case alone."""
+    """Links each name to the file that differs from it only by case."""
     files = {str(path.relative_to(folder)).lower(): path for path in folder.rglob("*.h")}
     for name in names:
         path = files.get(name.lower())

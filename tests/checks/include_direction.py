@@ -47,7 +47,7 @@ RULES = (
          "the value classes know neither adapter nor facade"),
     Rule(("include/*.h", "src/*/*.h", "src/*/*.cpp", "src/*.h", "src/*.cpp"), PLATFORM,
          frozenset({"<fbxsdk.h>", "<fbxsdk/Platform.h>"}), "the library sees the platform only as <fbxsdk.h>",
-         # The bundled platform alone can be told a number of threads: builds against another one leave the include out.
+         # Only the bundled platform has a number of threads: builds against another one omit the include.
          frozenset({("src/MaximumThreads.cpp", "<fbxsdk/extensions/Threads.h>")})),
     Rule(("include/Fbx[!P]*.h",), re.compile("<fbxsdk.h>"), frozenset(),
          "where file names ignore case that is FbxSdk.h: public headers include FbxPlatform.h"),
@@ -78,7 +78,7 @@ def violations(root):
     return [violation for rule in RULES for violation in violations_of(rule, root)] + list(module_violations(root))
 
 
-# The platform's modules: which may use which is said once, where they are built.
+# The platform's modules: their dependencies are declared once, where they are built.
 MODULES_FILE = "fbxsdk/CMakeLists.txt"
 MODULE = re.compile(r"tarnell_module\((\w+)(?: NEEDS ([\w ]+?))?(?: LIBRARIES [^)]*)?\)")
 PLATFORM_INCLUDE = re.compile(r'^(?:"(\w+)/[^"]+"|<fbxsdk/([\w/]+)\.h>)$')
@@ -92,7 +92,7 @@ OTHER_HEADERS = {
 
 
 def modules(root):
-    """Each module with those that it may use."""
+    """Each module with its dependencies."""
     path = root / MODULES_FILE
     text = path.read_text(encoding="utf-8") if path.exists() else ""
     usable = {}

@@ -32,7 +32,7 @@ def headers_below(folder):
 
 
 def check_all_headers_are_there(include):
-    """What the sources have, the package has, at the place where it is included from."""
+    """The package has every public header of the sources, at its include path."""
     platform = os.path.join("fbxsdk", "include")
     for source, target in (("include", include), (platform, os.path.join(include, "platform"))):
         folder = os.path.join(ROOT, source)
@@ -74,7 +74,7 @@ def check_cmake(prefix, folder):
 
 
 def check_pkg_config(prefix, library_folder, folder):
-    """The compiler by hand, with what pkg-config says; the loader is told the folder, as for any library there."""
+    """Calls the compiler with the flags of pkg-config; the loader gets the folder, as for any library there."""
     tool = shutil.which("pkg-config")
     if not tool:
         print("no pkg-config here: not checked")

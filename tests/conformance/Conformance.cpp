@@ -2,8 +2,8 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Reads every file of the corpus, compares it with its reference and prints a table. Fails when a row agrees less than
-// expected.json says, or when the files that differ are not those listed there. With --through every file is written
-// anew as well, and its copies must agree with the reference as well as the file itself does.
+// expected.json states, or when the files that differ are not those listed there. With --through every file is
+// rewritten as well, and its copies must agree with the reference as well as the file itself does.
 #include "Converting.h"
 #include "Corpus.h"
 #include "Expectations.h"
@@ -189,7 +189,7 @@ void checkCopies(const CorpusFile& file, const Options& options,
     }
 }
 
-/// Prints how the copies of one form compare; whether that fails the run.
+/// Prints how the copies of one form compare; returns whether that fails the run.
 bool judgeRoundTrip(const RoundTrip& comparison, const Options& options) {
     comparison.print();
     const std::vector<std::string> violations =
@@ -237,7 +237,7 @@ void checkConvertible(LoadedFile& loaded, const CorpusFile& file, const Options&
     }
 }
 
-/// Checks what becomes of one file against the file itself.
+/// Checks the conversion of one file against the file itself.
 void checkConversions(const CorpusFile& file, const Options& options,
                       const std::vector<std::unique_ptr<ConvertedForms>>& forms) {
     if (!file.reference)

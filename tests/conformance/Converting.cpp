@@ -26,7 +26,7 @@ int run(std::vector<std::string> words) {
     arguments.push_back(nullptr);
     posix_spawn_file_actions_t actions;
     ::posix_spawn_file_actions_init(&actions);
-    ::posix_spawn_file_actions_addopen(&actions, 2, "/dev/null", 1, 0); // losses are not what is compared
+    ::posix_spawn_file_actions_addopen(&actions, 2, "/dev/null", 1, 0); // losses are not compared
     pid_t child = 0;
     const int failure = ::posix_spawn(&child, words[0].c_str(), &actions, nullptr, arguments.data(), environ);
     ::posix_spawn_file_actions_destroy(&actions);

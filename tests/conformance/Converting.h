@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files of the corpus, put through the tool's convert.
+// Files of the corpus, converted by the tool.
 #pragma once
 
 #include "../support/TemporaryFolder.h"
@@ -13,17 +13,17 @@
 
 namespace conformance {
 
-/// What files are converted to: "2016:binary".
+/// The target of a conversion: "2016:binary".
 struct ConvertedForm {
     std::string year;
     bool ascii = false;
 };
 std::optional<ConvertedForm> parseConvertedForm(const std::string& text);
 
-/// Where convert puts the nodes of a loaded file.
+/// Where convert places the nodes of a loaded file.
 FlatPlaces flatPlacesOf(const LoadedFile& file);
 
-/// Goes with all its files.
+/// Removed with all its files.
 class ConvertedCorpus {
 public:
     explicit ConvertedCorpus(ConvertedForm form) : mForm(std::move(form)) {}

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Where the real files are and what belongs together: the FBX file, its reference, and the Wavefront files of its
+// Where the real files are and which belong together: the FBX file, its reference, and the Wavefront files of its
 // scene.
 #pragma once
 
@@ -25,7 +25,7 @@ struct CorpusFile {
     std::vector<WavefrontSibling> wavefront;
 };
 
-/// The folder that $TARNELL_CORPUS names, else the one beside the project; nothing when there is none.
+/// The folder that $TARNELL_CORPUS names, else the one next to the project; nothing when there is none.
 std::optional<std::filesystem::path> findCorpus();
 
 /// Every FBX file of the corpus, sorted by name.

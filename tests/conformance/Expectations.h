@@ -13,7 +13,7 @@
 
 namespace conformance {
 
-/// What a run found for a row over all files.
+/// The findings of a run for a row over all files.
 struct RowResult {
     std::int64_t compared = 0;
     std::int64_t agreeing = 0;
@@ -33,11 +33,11 @@ class Expectations {
 public:
     explicit Expectations(const std::filesystem::path& path);
 
-    /// A sentence for everything that is worse than expected, or better without being written down.
+    /// A sentence for everything that is worse than expected, or better without being recorded.
     [[nodiscard]] std::vector<std::string> violations(const Results& results) const;
-    /// Why a file differs in a row; empty when no reason is written down.
+    /// Why a file differs in a row; empty when no reason is recorded.
     [[nodiscard]] std::string reasonOf(const std::string& row, const std::string& file) const;
-    /// Takes the numbers over. Files that agree now are dropped, new ones come in without a reason, which violates.
+    /// Records the numbers. Files that agree now are dropped, new ones are added without a reason, which violates.
     void update(const Results& results);
     void write() const;
 

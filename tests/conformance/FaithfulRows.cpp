@@ -42,7 +42,7 @@ struct List {
     std::map<std::size_t, Object*> ofNode; ///< by the index in the reference
 };
 
-/// Clips that last for days are read at fewer frames per second: their samples are not what is compared.
+/// Clips that last for days are read at fewer frames per second: their samples are not compared.
 constexpr double kLongClip = 100'000;
 
 double slownessOf(const Reference& reference) {
@@ -65,7 +65,7 @@ TnFbxReadInfo infoOf(const LoadedFile& file, double frame) {
     return info;
 }
 
-/// The kinds that hand their nodes out in a list, as the reference names them.
+/// The kinds whose nodes are returned in a list, as the reference names them.
 bool isMesh(const fbxsdk::FbxNode& node) {
     const fbxsdk::FbxNodeAttribute* attribute = node.GetNodeAttribute();
     return attribute && attribute->GetAttributeType() == fbxsdk::FbxNodeAttribute::eMesh;
@@ -81,7 +81,7 @@ bool isLight(const fbxsdk::FbxNode& node) {
 }
 bool isAny(const fbxsdk::FbxNode& /*node*/) { return true; }
 
-/// Reads all objects of a kind. The library hands out parents before their children, as the scene has them.
+/// Reads all objects of a kind. The library returns parents before their children, as the scene has them.
 template <class Object>
 List<Object> read(LoadedFile& file, TnFbxReadInfo info, Reader<Object> reader, bool (*isOfKind)(const fbxsdk::FbxNode&),
                   Findings& findings) {
@@ -216,7 +216,7 @@ struct Gate {
     double width, height;
 };
 
-/// The film as much of it as the picture shows.
+/// The part of the film that is in the picture.
 Gate fitted(double width, double height, double aspect, int gateFit) {
     const double film = width / height;
     switch (gateFit) {
@@ -281,7 +281,7 @@ double largestOf(const std::vector<double>& numbers) {
     return largest;
 }
 
-/// Our place of the corner that stands at a place of the file: of mirrored meshes polygons go the other way round.
+/// Our index of a corner of the file: the polygons of mirrored meshes are reversed.
 std::vector<int> placesOfCorners(fbxsdk::FbxMesh& source, const TnFbxMesh& mesh) {
     std::vector<int> places(static_cast<std::size_t>(std::max(source.GetPolygonVertexCount(), 0)), -1);
     int ours = 0;
@@ -325,7 +325,7 @@ void checkFaithfulTransforms(LoadedFile& file, Findings& findings) {
     }
 }
 
-/// A parent's place in the world and the local one of its child are the child's in the world.
+/// The global transform of a parent and the local one of its child give the child's global transform.
 void checkFaithfulLocals(LoadedFile& file, Findings& findings) {
     const Reference& reference = file.reference();
     for (std::size_t f = 0; f < reference.frames.size(); ++f) {
@@ -374,7 +374,7 @@ void checkFaithfulSamples(LoadedFile& file, Findings& findings) {
     }
 }
 
-/// Where nothing but the curves moves a node, its local channels are those curves, turn for turn.
+/// Where only the curves move a node, its local channels are those curves, including full turns.
 void checkFaithfulCurves(LoadedFile& file, Findings& findings) {
     const Reference& reference = file.reference();
     if (!reference.stacks.empty() && reference.stacks[0].layers > 1)
@@ -448,7 +448,7 @@ void checkFaithfulLights(LoadedFile& file, Findings& findings) {
     }
 }
 
-/// What references say of angles and film is what a picture of the file's size shows of them.
+/// References state angles and film as a picture of the file's size shows them.
 void checkFaithfulLenses(LoadedFile& file, Findings& findings) {
     const Reference& reference = file.reference();
     const std::vector<FaithfulNode> faithful = readFaithfulReference(faithfulReferenceOf(file));

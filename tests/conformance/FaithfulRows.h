@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The rows of the second table: what a host sees through the facade when it asks for what the application shows.
+// The rows of the second table: what a host reads through the facade when it requests what the application shows.
 #pragma once
 
 #include "Rows.h"
@@ -12,7 +12,7 @@
 namespace conformance {
 
 std::span<const Row> faithfulRows();
-/// Whether the row holds of converted files, too, in which every node stands below the root and has a key per frame.
+/// Whether the row applies to converted files, too, in which every node is below the root and has a key per frame.
 bool survivesConversion(const Row& row);
 /// Whether the file has meshes that skins, blend shapes or caches deform.
 bool deforms(const CorpusFile& file);
@@ -36,7 +36,7 @@ using PointSource = std::function<std::vector<Point>(std::size_t nodeIndex)>;
 /// All meshes of the file against one of its Wavefront files.
 void compareWithWavefront(LoadedFile& file, const WavefrontSibling& sibling, const PointSource& pointsOf,
                           Findings& findings);
-/// The time in the file that a Wavefront file stands for.
+/// The time in the file at which a Wavefront file was saved.
 double secondsOf(const WavefrontSibling& sibling, const Reference& reference);
 
 } // namespace conformance

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Straight from the definitions (docs/kept-behaviours.md), without regard to speed.
+// Directly from the definitions (docs/kept-behaviours.md), without regard to speed.
 #include "KeptPoints.h"
 
 #include <cmath>
@@ -13,7 +13,7 @@ using namespace fbxsdk;
 
 namespace {
 
-/// Adds what one curve of a channel does to the points.
+/// Adds the effect of one curve of a channel to the points.
 void addTargets(FbxBlendShapeChannel& channel, double weight, const std::vector<Point>& base,
                 std::vector<Point>& points) {
     const int targets = channel.GetTargetShapeCount();

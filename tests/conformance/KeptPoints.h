@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the library does with a mesh in a way of its own, and hosts rely on, worked out from the scene's data alone.
+// The deliberate behaviours of the library for meshes, computed from the scene's data alone.
 #pragma once
 
 #include "LoadedFile.h"
@@ -12,20 +12,21 @@
 
 namespace conformance {
 
-/// The control points that a skin moves. They stand in the world then, all others in the mesh's own space.
+/// The control points that a skin moves. They are in the world then, all others in the mesh's own space.
 std::set<int> skinnedPoints(fbxsdk::FbxMesh& mesh);
 
-/// The control points of a mesh with blend shapes at a time. Kept: a percentage multiplies the whole way to the target.
+/// The control points of a mesh with blend shapes at a time. Kept: a percentage multiplies the whole offset to the
+/// target.
 std::vector<Point> blendedPoints(fbxsdk::FbxMesh& mesh, const fbxsdk::FbxAnimStack* stack, const fbxsdk::FbxTime& time);
 
-/// What the corners of a mesh come with.
+/// The values of a mesh's corners.
 struct CornerContent {
     bool normals = false, uvs = false, colours = false;
 
     bool operator==(const CornerContent&) const = default;
 };
 
-/// What is read of what the mesh has. Kept: of the first layer by control point or polygon vertex, and with colours of
+/// The values that are read. Kept: of the first layer by control point or polygon vertex, and with colours of
 /// materials where there are none of vertices.
 CornerContent readContent(fbxsdk::FbxMesh& mesh, const CornerContent& has);
 

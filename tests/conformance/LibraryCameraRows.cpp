@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Cameras as the facade hands them out by default: where they are, where they look, and through what.
+// Cameras as the facade returns them by default: their placement, their direction, and their lens.
 #include "LibraryObjects.h"
 #include "Tolerances.h"
 
@@ -37,7 +37,7 @@ constexpr CameraRow kCameraValues[] = {
     {"aperture height", TnFbxCamera::kFbxCameraApertureHeight, "FilmHeight"},
 };
 
-/// Planes are lengths of the scene, and come in centimetres with it.
+/// Planes are lengths of the scene, and converted to centimetres with it.
 constexpr CameraRow kCameraLengths[] = {
     {"near plane", TnFbxCamera::kFbxCameraNearPlane, "NearPlane"},
     {"far plane", TnFbxCamera::kFbxCameraFarPlane, "FarPlane"},
@@ -52,7 +52,7 @@ void compareValues(std::span<const CameraRow> rows, const ReferenceNode& node, c
     }
 }
 
-/// A direction or place of the file, seen from axes of which Y is up.
+/// A direction or position of the file, in axes of which Y is up.
 Point turnedUpright(const Point& stored, const std::array<int, 3>& axes) {
     Point result = stored;
     for (std::size_t i = 0; i < result.size(); ++i) {
@@ -63,7 +63,7 @@ Point turnedUpright(const Point& stored, const std::array<int, 3>& axes) {
     return result;
 }
 
-/// A stored vector as it comes with the scene; nothing for what the file does not state.
+/// A stored vector in the scene's axes and unit; nothing for what the file does not state.
 std::optional<Point> storedVector(const Reference& reference, const ReferenceNode& node, const char* name) {
     const std::array numbers = {stated(node.camera, name, 0), stated(node.camera, name, 1),
                                 stated(node.camera, name, 2)};
@@ -81,7 +81,7 @@ Point cameraPoint(const TnFbxCamera& camera, int firstChannel) {
     return point;
 }
 
-/// What is not known is not compared.
+/// What is not stated is not compared.
 void comparePoint(const ReferenceNode& node, const std::string& what, const Point& actual,
                   const std::optional<Point>& expected, Findings& findings) {
     if (!expected)
@@ -106,7 +106,7 @@ void compareCommonValues(const Reference& reference, const ReferenceNode& node, 
                 kProjections, TnFbxCamera::kFbxCameraPerspective, findings);
 }
 
-/// Kept: an angle that drives the lens leaves the static focal length alone, and so do two angles.
+/// Kept: an angle that drives the lens leaves the static focal length unchanged, and so do two angles.
 void compareLens(const ReferenceNode& node, const TnFbxCamera& camera, Findings& findings) {
     const std::optional<double> mode = stated(node.camera, "ApertureMode");
     if (!mode)
@@ -118,7 +118,7 @@ void compareLens(const ReferenceNode& node, const TnFbxCamera& camera, Findings&
                   *mode == kFocalLength ? stated(node.camera, "FocalLength") : untouched, findings);
 }
 
-/// Kept: a property "FilmOffset" makes X of Y.
+/// Kept: a property "FilmOffset" copies X to Y.
 void compareFilmOffset(const ReferenceNode& node, const TnFbxCamera& camera, const FbxNodeAttribute& attribute,
                        Findings& findings) {
     const bool both = attribute.FindProperty("FilmOffset", true).IsValid();
@@ -171,7 +171,7 @@ Matrix12 localMatrix(const FbxNode& node, const Placement& local, const Matrix12
     return result;
 }
 
-/// Whether the library sampled what it has samples for at that frame.
+/// Whether the library has a sample at that frame, if it has samples.
 bool knowsFrame(const TnFbxTransform& transform, const Reference& reference, double frame) {
     for (int i = TnFbxTransform::kFbxTransformPositionX; i <= TnFbxTransform::kFbxTransformScaleZ; ++i) {
         const auto channel = static_cast<TnFbxTransform::EFbxTransformChannelType>(i);
@@ -208,7 +208,7 @@ void compareAim(const ReferenceNode& node, const TnFbxCamera& camera, Findings& 
     const Point upVector = cameraPoint(camera, TnFbxCamera::kFbxCameraUpPositionX);
     const std::optional<Point> side = forward ? unit(crossed(*forward, upVector)) : forward;
     if (!side)
-        return; // it looks nowhere, or along its up vector
+        return; // it has no direction, or looks along its up vector
     const Point up = crossed(*side, *forward);
     constexpr double kDegrees = 57.295779513082320877;
     const double roll = static_cast<double>(camera.getValue(TnFbxCamera::kFbxCameraRoll)) / kDegrees;
@@ -218,7 +218,7 @@ void compareAim(const ReferenceNode& node, const TnFbxCamera& camera, Findings& 
     comparePoint(node, "up", moved(rotation, {0, 1, 0}), rolled, findings);
 }
 
-/// Kept: a camera comes with its local placement, so that pivots, pre- and post-rotation are left to the host. All of
+/// Kept: a camera is read with its local placement, so that pivots, pre- and post-rotation are left to the host. All of
 /// it together must be the reference's matrix. Below a parent the parent's matrix comes first.
 void comparePlacement(LoadedFile& file, std::size_t nodeIndex, const TnFbxCamera& camera, std::size_t frameIndex,
                       Findings& findings) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Lights as the facade hands them out by default.
+// Lights as the facade returns them by default.
 #include "LibraryObjects.h"
 
 #include <array>
@@ -36,7 +36,7 @@ void compareLight(const ReferenceNode& node, const TnFbxLight& light, Findings& 
                 TnFbxLight::kFbxLightDecayNone, findings);
 }
 
-/// Kept: lights that shine along an axis are turned between the node and its geometric transform.
+/// Kept: lights that shine along an axis are rotated between the node and its geometric transform.
 Matrix12 turnOf(const ReferenceNode& node) {
     const std::optional<double> type = stated(node.light, "LightType");
     return turned(type == kDirectional || type == kSpot ? Point{-90, 0, 0} : Point{});

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What nodes are, and what the channels of a transform say at a frame.
+// The kinds of nodes, and the values of a transform's channels at a frame.
 #include "LibraryObjects.h"
 
 #include "Tolerances.h"

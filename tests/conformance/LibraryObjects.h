@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Objects as a host gets them, beside the nodes of the reference that they were read from.
+// Objects as a host gets them, paired with the nodes of the reference that they were read from.
 #pragma once
 
 #include "Placement.h"
@@ -35,15 +35,15 @@ struct HandedList {
     [[nodiscard]] std::span<const Object> span() const { return {objects.get(), count}; }
 };
 
-/// Reads all objects of a kind into an array of the facade's making.
+/// Reads all objects of a kind into an array created by the facade.
 template <class Object>
 using Reader = bool (Tarnell::Fbx::Fbx::*)(Tarnell::Fbx::TnFbxReadInfo&, Object**, int&) const;
 
 /// Of a node without an attribute: unknown.
 fbxsdk::FbxNodeAttribute::EType typeOf(const fbxsdk::FbxNode& node);
 
-/// Pairs objects with the nodes of these types. The library hands out parents before their children, which is
-/// the scene's order once it has made meshes of NURBS and patches.
+/// Pairs objects with the nodes of these types. The library returns parents before their children, which is
+/// the scene's order once it has converted NURBS and patches to meshes.
 template <class Object>
 std::vector<Handed<Object>> matched(LoadedFile& file, std::span<const Object> objects,
                                     std::span<const fbxsdk::FbxNodeAttribute::EType> types, Findings& findings) {
@@ -73,7 +73,7 @@ template <class Object>
 HandedList<Object> read(const LoadedFile& file, Tarnell::Fbx::TnFbxReadInfo& info, Reader<Object> reader,
                         Findings& findings) {
     info.setFileName(file.file().path.string());
-    info.setAnimationStackName("any"); // only has to be there
+    info.setAnimationStackName("any"); // only must not be empty
     Object* objects = nullptr;
     int count = 0;
     const bool success = (Tarnell::Fbx::Fbx().*reader)(info, &objects, count);
@@ -95,15 +95,15 @@ bool hasKind(const Reference& reference, const std::string& kind);
 void compareMatrices(const Reference& reference, const ReferenceNode& node, std::size_t frameIndex,
                      const Matrix12& actual, const Matrix12& expected, Findings& findings);
 
-/// Where the node's content stands; `turn` comes between the node and its geometric transform.
+/// The placement of the node's content; `turn` is between the node and its geometric transform.
 Matrix12 contentInWorld(const ReferenceNode& node, std::size_t frameIndex, const Matrix12& turn);
 
-/// What a host rebuilds from the channels against what it should get of the reference's matrix, at every frame that
+/// What a host reconstructs from the channels against the reference's matrix, at every frame that
 /// was sampled. References have no more than the values at their frames.
 void compareInWorld(const Reference& reference, const ReferenceNode& node,
                     const Tarnell::Fbx::TnFbxTransform& transform, const Matrix12& turn, Findings& findings);
 
-/// A number that the reference knows; nothing for what the file does not state.
+/// A number that the reference states; nothing for what the file does not state.
 std::optional<double> stated(const NamedNumbers& values, const char* name, std::size_t component = 0);
 /// What is not stated is not compared.
 void compareNumber(const ReferenceNode& node, const std::string& what, float actual, std::optional<double> expected,
@@ -114,7 +114,7 @@ struct NumberRow {
     int stored, handedOut;
 };
 
-/// What no row holds is `otherwise`.
+/// A number without a row is `otherwise`.
 void compareEnum(const ReferenceNode& node, const std::string& what, int actual, std::optional<double> stored,
                  std::span<const NumberRow> rows, int otherwise, Findings& findings);
 

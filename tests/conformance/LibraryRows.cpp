@@ -112,7 +112,7 @@ void checkLibraryMeshes(LoadedFile& file, Findings& findings) {
     for (const Handed<TnFbxMesh>& handed : matched(file, list.span(), kMeshTypes, findings)) {
         const ReferenceNode& node = file.reference().nodes[handed.nodeIndex];
         if (!node.mesh)
-            continue; // made of a NURBS surface
+            continue; // converted from a NURBS surface
         const ReferenceMesh& expected = *node.mesh;
         const TnFbxMesh& mesh = *handed.object;
         const MeshSums sums = sumsOf(mesh);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the facade hands out by default: places in the world, and meshes whose points stand there.
+// What the facade returns by default: global transforms, and meshes whose points are in the world.
 #include "KeptPoints.h"
 #include "LibraryObjects.h"
 #include "Tolerances.h"
@@ -35,8 +35,8 @@ struct MeshMoment {
     [[nodiscard]] fbxsdk::FbxMesh& mesh() const { return *file.nodeOf(nodeIndex)->node->GetMesh(); }
 };
 
-/// Every `sampleStep`-th point as it should be handed out. Kept: what moves the points is the position, rotation and
-/// scale that the host sees; it moves points of a skin, too, which stand in the world before.
+/// Every `sampleStep`-th point as it should be returned. Kept: the points are transformed by the position, rotation and
+/// scale that the host reads; also points of a skin, which are in the world before.
 std::vector<Point> bakedPoints(const MeshMoment& moment, const Matrix12& bake) {
     std::vector<Point> result;
     const ReferenceMesh& mesh = *moment.node().mesh;
@@ -53,7 +53,7 @@ std::vector<Point> bakedPoints(const MeshMoment& moment, const Matrix12& bake) {
     return result;
 }
 
-/// The same for blend shapes, which the library weights in a way of its own.
+/// The same for blend shapes, which the library weights in its own way.
 std::vector<Point> bakedBlend(const MeshMoment& moment, const Matrix12& bake) {
     std::vector<Point> result;
     const fbxsdk::FbxTime time = timeOfSeconds(moment.file.reference().seconds(moment.frameIndex));
@@ -113,7 +113,7 @@ void compareMeshes(LoadedFile& file, std::size_t frameIndex, Findings& findings)
     const auto list = read<TnFbxMesh>(file, info, &Fbx::getMeshes, findings);
     for (const Handed<TnFbxMesh>& handed : matched(file, list.span(), kMeshTypes, findings)) {
         if (!reference.nodes[handed.nodeIndex].mesh)
-            continue; // made of a NURBS surface
+            continue; // converted from a NURBS surface
         const MeshMoment moment{file, handed.nodeIndex, frameIndex};
         if (frameIndex == 0)
             compareContent(moment, *handed.object, findings);

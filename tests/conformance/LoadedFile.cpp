@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Loads a file the way the library does, but stops before the conversion to read what the file stores.
+// Loads a file the way the library does, but stops before the conversion to read the stored values.
 #include "LoadedFile.h"
 
 #include "Utf8.h"
@@ -228,7 +228,7 @@ void LoadedFile::matchReference() {
 void LoadedFile::matchPlaces(const FlatPlaces& places) {
     std::array<std::vector<const SceneNode*>, kFlatGroups> groups;
     for (const SceneNode& entry : mNodes) {
-        const bool skews = entry.node->GetChildCount() > 0; // stands above a node for the skew of that
+        const bool skews = entry.node->GetChildCount() > 0; // is the parent of a node for its skew
         if (!skews)
             groups[static_cast<std::size_t>(flatGroupOf(*entry.node, /*converted*/ true))].push_back(&entry);
     }

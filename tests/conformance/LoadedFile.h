@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A file as the platform reads it: its nodes beside those of the reference, values as stored, then the scene in the
-// library's normal form (centimetres, Y up, right-handed).
+// A file as the platform reads it: its nodes paired with those of the reference, values as stored, then the scene in
+// the library's normal form (centimetres, Y up, right-handed).
 #pragma once
 
 #include "Corpus.h"
@@ -19,7 +19,7 @@ namespace conformance {
 /// A node of the scene, with what has to be read before the conversion changes it.
 struct SceneNode {
     fbxsdk::FbxNode* node = nullptr;
-    std::string name;             ///< with U+FFFD for what is no UTF-8, as references have it
+    std::string name;             ///< with U+FFFD for invalid UTF-8, as references have it
     int parent = -1;              ///< index in the same list
     NamedNumbers curves;          ///< as stored: the sums over the layers, per frame of the reference
     NamedNumbers camera, light;   ///< as stored
@@ -33,10 +33,10 @@ struct FlatPlace {
     FlatGroup group;
     int index;
 };
-/// By the index in the reference; nothing for what is not converted.
+/// By the index in the reference; nothing for nodes that are not converted.
 using FlatPlaces = std::vector<std::optional<FlatPlace>>;
 
-/// Of a node of a file, or of one that was converted.
+/// For a node of a file, or for a converted one.
 FlatGroup flatGroupOf(const fbxsdk::FbxNode& node, bool converted);
 
 bool isWholeFrame(double frame);
@@ -59,17 +59,17 @@ public:
     [[nodiscard]] fbxsdk::FbxAnimStack* firstStack() const;
     /// The nodes below the root, parents before their children.
     [[nodiscard]] const std::vector<SceneNode>& nodes() const { return mNodes; }
-    /// The node that the reference has at `index`; null when this scene has none like it.
+    /// The counterpart of the reference's node at `index`; null when this scene has none.
     [[nodiscard]] const SceneNode* nodeOf(std::size_t index) const { return mNodeOfReference[index]; }
     /// Compares whole frames only: converted files have keys there.
     void compareWholeFrames() { mWholeFrames = true; }
     [[nodiscard]] bool compares(std::size_t frameIndex) const { return comparesFrame(mReference.frames[frameIndex]); }
     [[nodiscard]] bool comparesFrame(double frame) const { return !mWholeFrames || isWholeFrame(frame); }
 
-    /// Whether the reference's node is one of the producer cameras, which this scene keeps beside the tree.
+    /// Whether the reference's node is one of the producer cameras, which this scene keeps outside of the tree.
     [[nodiscard]] bool besideTree(std::size_t index) const;
 
-    /// What deforms meshes; its own scene stays empty.
+    /// Deforms the meshes; its own scene stays empty.
     [[nodiscard]] Tarnell::Fbx::FbxSdk& sdk() { return mSdk; }
 
 private:
@@ -95,7 +95,7 @@ private:
 
 /// The frame's time in the file.
 fbxsdk::FbxTime timeOfSeconds(double seconds);
-/// The node's place in the world at a time.
+/// The node's global transform at a time.
 fbxsdk::FbxAMatrix worldMatrix(fbxsdk::FbxNode& node, const fbxsdk::FbxTime& time);
 /// The node's geometric transform.
 fbxsdk::FbxAMatrix geometricMatrix(const fbxsdk::FbxNode& node);

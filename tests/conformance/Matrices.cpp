@@ -27,7 +27,7 @@ Point cross(const Point& a, const Point& b) {
 
 double dot(const Point& a, const Point& b) { return a[0] * b[0] + a[1] * b[1] + a[2] * b[2]; }
 
-/// The turn of the axis `next` toward the one after it.
+/// The rotation of the axis `next` toward the one after it.
 Matrix12 turnedAbout(std::size_t axis, double degrees) {
     const double angle = degrees * kPi / 180.0;
     const std::size_t from = (axis + 1) % 3, to = (axis + 2) % 3;

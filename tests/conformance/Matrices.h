@@ -19,7 +19,7 @@ Matrix12 product(const Matrix12& outer, const Matrix12& inner);
 /// Without an inverse, as for a scale of zero: nothing.
 std::optional<Matrix12> inverse(const Matrix12& matrix);
 
-/// A turn about X, then Y, then Z, in degrees.
+/// A rotation about X, then Y, then Z, in degrees.
 Matrix12 turned(const Point& degrees);
 Matrix12 scaled(const Point& factors);
 Matrix12 shifted(const Point& offset);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Undeformed and cached points stand in the mesh's own space, skinned ones in the node's, where the geometric
+// Undeformed and cached points are in the mesh's own space, skinned ones in the node's, where the geometric
 // transform is already applied.
 #include "MeshPoints.h"
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The control points of a node's mesh in the world, deformed by what the library deforms with.
+// The control points of a node's mesh in the world, deformed as by the library.
 #pragma once
 
 #include "LoadedFile.h"
@@ -18,7 +18,7 @@ bool hasBlendShapes(fbxsdk::FbxMesh& mesh);
 /// Every control point in the world. Caches have to be open.
 std::vector<Point> worldPoints(LoadedFile& file, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh, fbxsdk::FbxTime time);
 
-/// The scene's point caches are open as long as this lives.
+/// The scene's point caches are open for the lifetime of the object.
 class OpenCaches {
 public:
     explicit OpenCaches(LoadedFile& file) : mFile(file) { mFile.sdk().openClosePointCacheData(mFile.scene(), true); }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes: what they consist of, and where their points are.
+// Meshes: their data, and their points.
 #include "MeshPoints.h"
 #include "Rows.h"
 #include "Tolerances.h"

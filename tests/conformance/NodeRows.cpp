@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The tree of nodes, the animation stacks, and where the nodes are.
+// The tree of nodes, the animation stacks, and the placement of nodes.
 #include "Matrices.h"
 #include "Rows.h"
 #include "Tolerances.h"
@@ -51,7 +51,7 @@ struct Description {
     [[nodiscard]] std::string text() const { return kind + " \"" + name + "\" below " + std::to_string(parent); }
 };
 
-/// What the reference has in the tree. Parents are renumbered where producer cameras are left out.
+/// The reference's nodes in the tree. Parents are renumbered where producer cameras are omitted.
 std::vector<Description> referenceTree(const LoadedFile& file) {
     std::vector<Description> tree;
     std::vector<int> newIndex;

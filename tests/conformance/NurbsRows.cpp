@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // NURBS surfaces against the Wavefront file of the same surface: its points lie on the surface, as do those of our
-// mesh. The surface is evaluated here, by its definition, so that the library's tessellation has no part in it.
+// mesh. The surface is evaluated here, by its definition, independently of the library's tessellation.
 #include "Rows.h"
 #include "Tolerances.h"
 #include "WavefrontFile.h"
@@ -59,7 +59,7 @@ public:
         std::array<double, 4> sum{};
         for (int j = 0; j < mV.functions(); ++j) {
             for (int i = 0; i < mU.functions(); ++i) {
-                // Closed surfaces go on with their first points.
+                // Closed surfaces repeat their first points.
                 const FbxVector4& point = mPoints[static_cast<std::size_t>(j % mV.count * mU.count + i % mU.count)];
                 const double weight = inU[static_cast<std::size_t>(i)] * inV[static_cast<std::size_t>(j)] * point[3];
                 for (int k = 0; k < 3; ++k)
@@ -70,7 +70,7 @@ public:
         return {sum[0] / sum[3], sum[1] / sum[3], sum[2] / sum[3]};
     }
 
-    /// How far the point is from the surface: from the nearest point of a grid, step by step nearer.
+    /// The distance of the point from the surface: from the nearest point of a grid, refined step by step.
     [[nodiscard]] double distance(const Point& point) const {
         constexpr int kGrid = 32;
         double u = 0, v = 0, best = HUGE_VAL;

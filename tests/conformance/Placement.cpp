@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The two decompositions, straight from their definitions.
+// The two decompositions, directly from their definitions.
 #include "Placement.h"
 
 #include <cmath>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Products, inverses and the two decompositions, against numbers worked out by hand.
+// Products, inverses and the two decompositions, against numbers computed by hand.
 #include "Placement.h"
 
 #include <gtest/gtest.h>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What an independent reader finds in a file, in centimetres, Y up and right-handed. A number that it does not know
+// The data of a file as found by an independent reader, in centimetres, Y up and right-handed. An unknown number
 // is NaN here.
 #pragma once
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Reads a file with the platform and writes it with the platform: what the library would not keep stays, too.
+// Reads and writes a file with the platform: data that the library would drop is kept.
 #include "Rewriting.h"
 
 #include <fbxsdk.h>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files of the corpus, read and written anew: in another version and encoding, in a folder of their own.
+// Files of the corpus, read and rewritten: in another version and encoding, in a folder of their own.
 #pragma once
 
 #include "../support/TemporaryFolder.h"
@@ -19,13 +19,13 @@ struct WrittenForm {
 };
 std::optional<WrittenForm> parseWrittenForm(const std::string& text);
 
-/// Goes with all its files.
+/// Removed with all its files.
 class RewrittenCorpus {
 public:
-    /// What lies beside the files of the corpus, like point caches, is found from the new folder, too.
+    /// Files next to those of the corpus, such as point caches, are found from the new folder, too.
     RewrittenCorpus(const std::filesystem::path& corpus, WrittenForm form);
 
-    /// The same file, written anew; nothing when it cannot be read.
+    /// The same file, rewritten; nothing when it cannot be read.
     /// Throws std::runtime_error when it is read, but cannot be written.
     [[nodiscard]] std::optional<CorpusFile> rewrite(const CorpusFile& file) const;
 

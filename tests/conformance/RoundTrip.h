@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A written copy must agree with the references wherever the file itself does; the exceptions stand in rewritten.json.
+// A written copy must agree with the references wherever the file itself does; the exceptions are in rewritten.json.
 #pragma once
 
 #include "Expectations.h"
@@ -18,10 +18,10 @@ public:
     /// `form` as the exceptions name it.
     RoundTrip(const std::filesystem::path& exceptions, std::string form);
 
-    /// The rows of one file before and after; notes those in which more values differ after.
+    /// The rows of one file before and after; records those in which more values differ after.
     void add(const std::string& file, const Results& before, const Results& after);
 
-    /// A sentence for everything that is worse and no known exception, and for exceptions that are none any more.
+    /// A sentence for everything that is worse and no known exception, and for exceptions that no longer apply.
     [[nodiscard]] std::vector<std::string> violations() const;
     void print() const;
 

@@ -40,16 +40,16 @@ void checkWorldPoints(LoadedFile& file, Findings& findings);
 void checkDeformedPoints(LoadedFile& file, Findings& findings);
 void checkWavefrontPoints(LoadedFile& file, Findings& findings);
 void checkDeformedWavefrontPoints(LoadedFile& file, Findings& findings);
-// What the library hands out as the scene has it.
+// What the library returns in the scene's spaces.
 void checkLibraryMeshes(LoadedFile& file, Findings& findings);
 void checkLibraryLocalSamples(LoadedFile& file, Findings& findings);
-// What it hands out by default.
+// What it returns by default.
 void checkLibraryWorldTransforms(LoadedFile& file, Findings& findings);
 void checkLibraryBakedMeshes(LoadedFile& file, Findings& findings);
 void checkLibraryCameras(LoadedFile& file, Findings& findings);
 void checkLibraryLights(LoadedFile& file, Findings& findings);
 
-// Puts meshes in the place of the surfaces, so this row comes last.
+// Replaces the surfaces by meshes, so this row comes last.
 void checkNurbsSurfaces(LoadedFile& file, Findings& findings);
 
 } // namespace conformance

@@ -16,13 +16,13 @@ constexpr double kCountTolerance = 5e-9;
 /// Curve values are floats (6e-8), and a channel is in degrees: a turn of 360° is off by 4e-7 radians, which the levers
 /// of a dozen nested nodes multiply.
 constexpr double kEvaluatedTolerance = 1e-5;
-/// What the library hands out are floats of such values.
+/// The library returns floats of such values.
 constexpr double kHandedOutTolerance = 1e-5;
 /// A tick is 2.2e-11 s; older files count time in coarser steps, and references print nine digits.
 constexpr double kSecondsTolerance = 1e-7;
 
-/// Equal within `tolerance` of the larger of 1 and `scale`. What is no finite number in the reference must be none
-/// here.
+/// Equal within `tolerance` of the larger of 1 and `scale`. A number that is not finite in the reference must not be
+/// finite here.
 inline bool closeTo(double actual, double expected, double tolerance, double scale) {
     if (!std::isfinite(expected))
         return !std::isfinite(actual);

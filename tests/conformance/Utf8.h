@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Names that are no UTF-8, as references spell them.
+// Invalid UTF-8 in names, as references spell it.
 #pragma once
 
 #include <string>
@@ -9,7 +9,7 @@
 
 namespace conformance {
 
-/// The text with U+FFFD in the place of every byte that belongs to no character.
+/// The text with U+FFFD instead of every byte that belongs to no character.
 std::string withoutInvalidUtf8(std::string_view text);
 
 } // namespace conformance

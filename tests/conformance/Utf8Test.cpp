@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Replacement of what is no UTF-8.
+// Replacement of invalid UTF-8.
 #include "Utf8.h"
 
 #include <gtest/gtest.h>

@@ -27,7 +27,7 @@ std::string text(const std::vector<double>& values) {
 
 bool isUnknown(const std::vector<double>& values) { return values.size() == 1 && std::isnan(values[0]); }
 
-/// Values by name of one node. A name that only this side has is not looked at: the reference leaves out what the file
+/// Values by name of one node. A name that only this side has is ignored: the reference omits what the file
 /// does not state, this side has the default of the class.
 void compareStated(const ReferenceNode& node, const NamedNumbers* actual, const NamedNumbers& expected,
                    Findings& findings) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Lines of points and faces, and what comments say about order and precision.
+// Lines of points and faces, and comments about order and precision.
 #include "WavefrontFile.h"
 
 #include <charconv>
@@ -14,7 +14,7 @@
 namespace conformance {
 namespace {
 
-/// 3ds Max numbers points anew; other files say of themselves that their order is another one.
+/// 3ds Max renumbers points; other files state that their order differs.
 constexpr std::string_view kSignsOfOtherOrder[] = {"3ds Max Wavefront", "Max2Obj", "bad_order"};
 constexpr std::string_view kTolerance = "tolerance=";
 

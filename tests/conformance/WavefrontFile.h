@@ -12,7 +12,7 @@
 
 namespace conformance {
 
-/// The points that stand together, and the names of the group that their first face belongs to.
+/// The points of a block, and the names of the group that their first face belongs to.
 struct WavefrontBlock {
     std::vector<Point> points;
     std::vector<std::string> names;
@@ -21,12 +21,12 @@ struct WavefrontBlock {
 struct WavefrontFile {
     std::vector<WavefrontBlock> blocks;
     bool inOtherOrder = false; ///< the points are not in the order of the FBX file's
-    double tolerance = 0;      ///< a unit of the last digit printed, or what the file says of itself
+    double tolerance = 0;      ///< a unit of the last digit printed, or the tolerance that the file states
 };
 
 WavefrontFile readWavefront(const std::filesystem::path& path);
 
-/// FBXASC and three digits stand for a character that the format has no place for.
+/// FBXASC and three digits represent a character that the format cannot hold.
 std::string decodedName(std::string name);
 
 } // namespace conformance

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes against the Wavefront file that the same application saved of the same scene: an independent truth.
+// Meshes against the Wavefront file that the same application saved of the same scene: an independent reference.
 #include "FaithfulRows.h"
 #include "Tolerances.h"
 #include "WavefrontFile.h"
@@ -91,8 +91,8 @@ std::set<std::string> chainOf(const LoadedFile& file, std::size_t nodeIndex) {
     return names;
 }
 
-/// How well a block's names fit a node: groups list the node with its ancestors, in any order, or the node's name and
-/// the mesh's joined by an underscore. 0 is no fit.
+/// How well a block's names match a node: groups list the node with its ancestors, in any order, or the node's name and
+/// the mesh's joined by an underscore. 0 is no match.
 std::size_t fit(const WavefrontBlock& block, const std::string& nodeName, const std::set<std::string>& chain) {
     const auto isNode = [&](const std::string& name) { return name == nodeName || name.starts_with(nodeName + "_"); };
     if (std::ranges::none_of(block.names, isNode))
@@ -144,7 +144,7 @@ std::vector<Pair> pairsOf(LoadedFile& file, const WavefrontFile& wavefront, cons
             continue;
         const WavefrontBlock* block = blockOf(wavefront, file, i);
         if (block == nullptr)
-            continue; // the application left the node out
+            continue; // the application omitted the node
         const SceneNode* entry = file.nodeOf(i);
         FbxMesh* mesh = entry ? entry->node->GetMesh() : nullptr;
         std::vector<Point> points;
@@ -168,7 +168,7 @@ std::vector<std::string> differencesIn(const Space& space, const Reference& refe
     return differences;
 }
 
-/// All meshes of a file stand in one space: the one in which most of them agree.
+/// All meshes of a file are in one space: the one in which most of them agree.
 void comparePairs(const Reference& reference, const WavefrontSibling& sibling, const WavefrontFile& wavefront,
                   const std::vector<Pair>& pairs, Findings& findings) {
     std::vector<std::string> best;
@@ -218,7 +218,7 @@ void compareWithWavefront(LoadedFile& file, const WavefrontSibling& sibling, con
     std::vector<Pair> pairs;
     for (std::size_t i = 0; i < nodes.size(); ++i) {
         const WavefrontBlock* block = nodes[i].mesh ? blockOf(wavefront, file, i) : nullptr;
-        if (block != nullptr) // else the application left the node out
+        if (block != nullptr) // else the application omitted the node
             pairs.push_back({&nodes[i].name, pointsOf(i), &block->points});
     }
     comparePairs(file.reference(), sibling, wavefront, pairs, findings);

@@ -1,8 +1,7 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-"""Every reason in expected.json, faithful.json and rewritten.json stands in the tables of docs/known-differences.md, and the other way
-round.
+"""Every reason in expected.json, faithful.json and rewritten.json is in docs/known-differences.md, and vice versa.
 
     known_differences.py PROJECT_FOLDER
 """

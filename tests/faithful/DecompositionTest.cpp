@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Matrices taken apart and put together again.
+// Matrices decomposed and recomposed.
 #include "faithful/Decomposition.h"
 #include "faithful/Timeline.h"
 

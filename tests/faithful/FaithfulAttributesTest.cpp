@@ -24,7 +24,7 @@ double valueOf(const TnFbxCamera& camera, TnFbxCamera::EFbxCameraChannelType cha
     return static_cast<double>(camera.getValue(channel));
 }
 
-/// Focal length, both angles and the film say the same.
+/// Focal length, both angles and the film are consistent.
 void expectLensAgrees(const TnFbxCamera& camera, double focalLength) {
     const double width = valueOf(camera, TnFbxCamera::kFbxCameraApertureWidth) * 25.4;
     const double height = valueOf(camera, TnFbxCamera::kFbxCameraApertureHeight) * 25.4;

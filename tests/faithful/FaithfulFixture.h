@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Reads through the facade of what the application shows: of files of the test data, and of scenes that a test builds.
+// Faithful reads through the facade: of files of the test data, and of scenes that a test builds.
 #pragma once
 
 #include "sdk/FixtureFiles.h"
@@ -21,7 +21,7 @@ inline TnFbxReadInfo faithfulRead(const std::string& fileName) {
     return info;
 }
 
-/// A built scene as a file, which goes with this.
+/// A built scene as a file, removed with the object.
 class SavedScene {
 public:
     explicit SavedScene(TestScene& scene) : mFile(mFolder.file("scene.fbx")) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes: where their points are, which way they face, and what their layers say.
+// Meshes: their points, the side that they face, and the values of their layers.
 #include "FaithfulFixture.h"
 
 #include "TnFbxError.h"
@@ -113,7 +113,7 @@ TEST(FaithfulBlendShapes, AreWeightedByPercentBetweenTheirTargets) {
     fbxsdk::FbxMesh& mesh = *addTriangle(scene, "mesh")->GetMesh();
     auto* blendShape = fbxsdk::FbxBlendShape::Create(scene.scene, "shapes");
     auto* channel = fbxsdk::FbxBlendShapeChannel::Create(scene.scene, "channel");
-    for (const double height : {1.0, 4.0}) { // full at 50 and at 100
+    for (const double height : {1.0, 4.0}) { // fully reached at 50 and at 100
         auto* shape = fbxsdk::FbxShape::Create(scene.scene, "target");
         shape->InitControlPoints(3);
         for (int i = 0; i < 3; ++i) {
@@ -149,7 +149,7 @@ TEST(FaithfulSkins, AreInTheWorldOnce) {
     }
 }
 
-/// A point at (0, 1, 0) halfway between a bone that stays and one that is turned by 90 degrees about X.
+/// A point at (0, 1, 0) halfway between a static bone and one that is rotated by 90 degrees about X.
 TEST(FaithfulSkins, TwistByDualQuaternionsAsMuchAsTheyAreBlended) {
     for (const auto& [blend, expected] :
          {std::pair(0.0, std::sqrt(0.5)), std::pair(1.0, 1.0), std::pair(0.5, (std::sqrt(0.5) + 1.0) / 2.0)}) {
@@ -168,7 +168,7 @@ TEST(FaithfulSkins, TwistByDualQuaternionsAsMuchAsTheyAreBlended) {
             cluster->SetTransformLinkMatrix(fbxsdk::FbxAMatrix({0.0, 0.0, 0.0}, {0.0, 0.0, 0.0}, {1.0, 1.0, 1.0}));
             skin->AddCluster(cluster);
         }
-        // Bound beside the origin, since a skin that is bound there says nothing.
+        // Bound away from the origin, since a skin that is bound there states no binding.
         fbxsdk::FbxAMatrix beside;
         beside.SetT({1.0, 0.0, 0.0});
         skin->GetCluster(0)->SetTransformLinkMatrix(beside);

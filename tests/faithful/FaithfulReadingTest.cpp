@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Which stack and which frames are read, and where objects are.
+// Which stack and which frames are read, and the placement of objects.
 #include "FaithfulFixture.h"
 
 #include "TnFbxError.h"

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What is written faithfully and read faithfully comes back: every kind and channel, in every version and encoding.
+// A faithful read returns what was written faithfully: every kind and channel, in every version and encoding.
 #include "FaithfulFixture.h"
 
 #include "FbxFaithful.h"
@@ -27,7 +27,7 @@ using Version = TnFbxWriteInfo::eCompatibilityVersion;
 
 constexpr float kTelevision = 24000.0f / 1001.0f;
 
-/// A file, written faithfully, which goes with this.
+/// A file, written faithfully, removed with the object.
 class FaithfulFile {
 public:
     explicit FaithfulFile(Version version = TnFbxWriteInfo::kFbxVersion2016, bool ascii = false) {
@@ -101,7 +101,7 @@ void expectSameTransform(Transform& expected, Transform& actual, float tolerance
     }
 }
 
-/// Samples of 1001 to 1005 that bend, and their static value: that of the first frame, which reads ask for.
+/// Samples of 1001 to 1005 that bend, and their static value: that of the first frame, which reads use.
 template <class Object, class Channel>
 void animate(Object& object, Channel channel, float from, float step) {
     TnFbxTime time;
@@ -222,7 +222,7 @@ TEST_P(EveryVersion, BringsLightsBack) {
 
 double radians(double degrees) { return degrees * 0.017453292519943295769; }
 
-/// Lens, film and angles that agree at every frame, so that each of them can come back.
+/// Lens, film and angles that are consistent at every frame, so that each of them can be read back.
 void setLens(Camera& camera, Camera::EFbxCameraApertureMode mode, bool animated) {
     camera.setApertureMode(mode);
     camera.setValue(Camera::kFbxCameraApertureWidth, 1.0f);

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Reading and writing while one allocation, or all from one on, fail. The result is std::bad_alloc, or false with a
-// reason, or all that the call gives otherwise; never less with success, and never the end of the process.
+// reason, or the complete result; never less with success, and never the end of the process.
 #include "FailingMalloc.h"
 
 #include <algorithm>
@@ -32,7 +32,7 @@
 namespace Tarnell::Fbx {
 namespace {
 
-/// What a call gave, in so far as it can be compared; nothing when it ran out of memory or failed.
+/// The result of a call, as far as it can be compared; nothing when it ran out of memory or failed.
 using Answer = std::optional<std::vector<double>>;
 
 class Numbers {
@@ -67,7 +67,7 @@ private:
     std::vector<double> mNumbers;
 };
 
-/// Of the call as it is: who gets less may say so by another one.
+/// Of an unlimited call: a call that gets less may report it by another one.
 std::vector<std::string>& usualWarnings() {
     static std::vector<std::string> warnings;
     return warnings;
@@ -79,7 +79,7 @@ void failUnlessTold(bool result) {
     }
 }
 
-/// Objects of one kind, read while memory may give out, and looked at when it does not any more.
+/// Objects of one kind, read while allocations may fail, and accessed when they do not any more.
 template <class Object>
 Answer read(bool (Fbx::*reader)(TnFbxReadInfo&, Object**, int&) const, TnFbxReadInfo& info) {
     Object* objects = nullptr;
@@ -98,7 +98,7 @@ Answer read(bool (Fbx::*reader)(TnFbxReadInfo&, Object**, int&) const, TnFbxRead
         failUnlessTold(result);
     }
     Numbers numbers;
-    for (int i = 0; objects != nullptr && i < count; ++i) { // whatever the result, they can be looked at
+    for (int i = 0; objects != nullptr && i < count; ++i) { // whatever the result, they can be accessed
         numbers.addChannels(objects[i]);
         if constexpr (std::is_same_v<Object, TnFbxMesh>) {
             numbers.addMesh(objects[i]);
@@ -107,9 +107,9 @@ Answer read(bool (Fbx::*reader)(TnFbxReadInfo&, Object**, int&) const, TnFbxRead
     return result && lastWarnings() == usualWarnings() ? Answer(numbers.take()) : std::nullopt;
 }
 
-/// Runs the work once as it is, and then with failing allocations.
+/// Runs the work once without failures, and then with failing allocations.
 void tryPositions(const std::function<Answer()>& work) {
-    static_cast<void>(work()); // what is made once and stays is there now
+    static_cast<void>(work()); // what is created once and kept exists by now
     usualWarnings() = lastWarnings();
     static_cast<void>(faults::countAllocations());
     const Answer expected = work();
@@ -202,7 +202,7 @@ TEST_P(WritingWithoutMemory, WritesAllOrFails) {
     camera.setTransformValueAt(TnFbxTransform::kFbxTransformRotationY, frames, {10.0f, 20.0f, 40.0f});
     camera.setValueAt(TnFbxCamera::kFbxCameraFocalLength, frames, {35.0f, 50.0f, 35.0f});
     TnFbxLight light;
-    light.setName("camera"); // a name that stands twice
+    light.setName("camera"); // a name that occurs twice
     TnFbxWriteInfo info;
     info.setFileName(folder.file("shot.fbx"));
     info.setAnimationStackName("Take 001");

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files that somebody writes anew in place while they are read, as many exporters do: the old content, or a failure
-// with a reason; never a signal, and never an empty mesh in place of one that could not be read.
+// Files that another program rewrites in place while they are read, as many exporters do: the old content, or a failure
+// with a reason; never a signal, and never an empty mesh instead of one that could not be read.
 #include <algorithm>
 #include <atomic>
 #include <filesystem>
@@ -25,7 +25,7 @@
 namespace Tarnell::Fbx {
 namespace {
 
-constexpr int kSide = 90; // points enough that their arrays are read late
+constexpr int kSide = 90; // enough points for their arrays to be read late
 constexpr int kPoints = kSide * kSide;
 constexpr int kSets = 3;
 
@@ -59,12 +59,12 @@ struct Layout {
     bool ascii;
     TnFbxWriteInfo::eCompatibilityVersion version;
     Caches caches;
-    const char* changes; ///< the extension of the file that is written anew
+    const char* changes; ///< the extension of the file that is rewritten
 };
 
 void PrintTo(const Layout& layout, std::ostream* out) { *out << layout.name; }
 
-/// A scene on disk, of which one file is shortened and written anew for as long as the object lives.
+/// A scene on disk, of which one file is shortened and rewritten for as long as the object exists.
 class Rewriting {
 public:
     explicit Rewriting(std::string file) : mFile(std::move(file)) {
@@ -79,7 +79,7 @@ public:
                 std::this_thread::yield();
                 out.write(mContent.data() + half, static_cast<std::streamsize>(mContent.size() - half));
                 out.close();
-                std::this_thread::sleep_for(std::chrono::milliseconds(round % 5)); // some reads meet a whole file
+                std::this_thread::sleep_for(std::chrono::milliseconds(round % 5)); // some reads find a complete file
             }
         });
     }
@@ -150,7 +150,7 @@ TEST_P(ChangingFile, IsReadAsItWasOrNotAtAll) {
     EXPECT_EQ(successes + failures, 60);
 }
 
-/// A cache is opened by the read that asks for it.
+/// A cache is opened by the read that needs it.
 class ChangingScene : public ChangingFile {};
 
 TEST_P(ChangingScene, FailsTheReadThatComesTooLate) {
@@ -165,7 +165,7 @@ TEST_P(ChangingScene, FailsTheReadThatComesTooLate) {
         for (int tries = 0; tries < 2; ++tries) {
             TnFbxMesh mesh;
             const bool result = sdk.getMeshes(info, &mesh, 1);
-            // What has no arrays, text and binary files before 7.x, is in memory as a whole.
+            // Files without arrays, ASCII and binary ones before 7.x, are in memory as a whole.
             if (GetParam().ascii || GetParam().version == TnFbxWriteInfo::kFbxVersion2010) {
                 EXPECT_TRUE(result) << lastError();
                 EXPECT_EQ(mesh.getNumberOfControlPoints(), kPoints);

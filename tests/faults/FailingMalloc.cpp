@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// In place of the system's functions, which go on under their inner names.
+// Replaces the system's functions, which are called under their internal names.
 #include "FailingMalloc.h"
 
 #include <atomic>

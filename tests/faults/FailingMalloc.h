@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The allocation functions of C in an executable that fail where a test says, for all libraries in it: those written in
-// C++ allocate through them, too, and so do those that inflate and parse.
+// The allocation functions of C in an executable that fail where a test chooses, for all libraries in it: those written
+// in C++ allocate through them, too, and so do those that inflate and parse.
 #pragma once
 
 namespace faults {

@@ -1,10 +1,10 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Any bytes beside a sound FBX file, as its point cache, give points or a sentence, and the same ones whoever asks: the
-// cache itself, the inspection of caches, and the facade.
+// Any bytes next to a valid FBX file, as its point cache, give points or a reason, and the same ones for every reader:
+// the cache itself, the inspection of caches, and the facade.
 //
-// An input is a Max cache (POINTCACHE2…), a Maya data file (FOR4… or FOR8…), which is read with a sound description, or
+// An input is a Max cache (POINTCACHE2…), a Maya data file (FOR4… or FOR8…), which is read with a valid description, or
 // a description, with everything from the first FOR4 or FOR8 on as its data.
 #include "fuzz/FuzzSupport.h"
 
@@ -27,7 +27,7 @@ using fbxsdk::FbxCache;
 using fbxsdk::extensions::CacheFacts;
 using fuzz::require;
 
-/// More would only cost time.
+/// More would only take time.
 constexpr int kChannelsRead = 4;
 constexpr std::uint64_t kMostPoints = std::uint64_t{1} << 16;
 
@@ -62,7 +62,7 @@ struct ManagerOwner {
     ~ManagerOwner() { manager->Destroy(); }
 };
 
-/// A folder with an FBX file for each kind of cache, and data of a cache that is sound.
+/// A folder with an FBX file for each kind of cache, and data of a valid cache.
 struct Stage {
     support::TemporaryFolder folder;
     std::string narrowData, wideData;
@@ -92,7 +92,7 @@ private:
     }
 };
 
-/// What one way of reading gives twice is the same, as doubles and as floats, and fills all of the buffer.
+/// Repeated reads give the same, as doubles and as floats, and fill all of the buffer.
 template <class Read>
 void readTwice(std::uint64_t pointCount, const Read& read) {
     std::vector<double> first(pointCount * 3, 1.0), second(pointCount * 3, 2.0);
@@ -151,7 +151,7 @@ bool inspect(const std::string& file, CacheFacts& facts) {
     return true;
 }
 
-/// The mesh has its points, those of the cache or its own, and who leaves the cache out says so.
+/// The mesh has its points, those of the cache or its own, and a read without the cache reports it.
 void readMesh(const std::string& file, bool faithful, bool cacheOpens) {
     TnFbxReadInfo info;
     info.setFileName(file);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Any bytes, read as a host reads a file, give sound objects or a sentence; and what was read can be written and read
+// Any bytes, read as a host reads a file, give valid objects or a reason; and what was read can be written and read
 // again.
 #include "fuzz/FuzzSupport.h"
 
@@ -26,7 +26,7 @@ namespace {
 
 using namespace Tarnell::Fbx;
 
-/// Longer clips are read, but not written: they would only cost time.
+/// Longer clips are read, but not written: they would only take time.
 constexpr int kLongestWrittenClip = 500;
 
 using fuzz::checkMesh;
@@ -65,7 +65,7 @@ bool areShort(const List<Object>& list) {
     return true;
 }
 
-/// How a file is read and written depends on its bytes: no way is left out.
+/// How a file is read and written depends on its bytes, so that every path is taken.
 struct Choices {
     std::size_t left;
     int take(std::size_t count) {

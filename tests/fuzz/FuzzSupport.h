@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the fuzz targets over the facade share: the end when something does not hold, objects that were read, and files
-// that need not settle first.
+// The common part of the fuzz targets over the facade: the abort when an invariant fails, objects that were read, and
+// files with an old time of modification.
 #pragma once
 
 #include "support/TemporaryFolder.h"
@@ -31,21 +31,21 @@ inline void require(bool holds, const char* what) {
     }
 }
 
-/// A file that was last written a while ago: readers look twice at one that is being written just now, which takes
+/// A file that was last written a while ago: readers check again one that is being written just now, which takes
 /// milliseconds.
 inline void writeOldFile(const support::TemporaryFolder& folder, const std::string& name, const std::string& content) {
     const std::string file = folder.write(name, content);
     std::filesystem::last_write_time(file, std::filesystem::file_time_type::clock::now() - std::chrono::hours(1));
 }
 
-/// What may be handed out at once: enough for sound files, and little enough to be handed out a thousand times a
+/// The memory limit of a call: enough for valid files, and little enough to be used a thousand times a
 /// minute.
 inline bool limitMemory() {
     Tarnell::Fbx::setMemoryLimit(std::uint64_t{1} << 20);
     return true;
 }
 
-/// Whether the last call failed for that.
+/// Whether the last call failed for that reason.
 inline bool isBeyondLimit() {
     return Tarnell::Fbx::lastError().find("would be needed, and the limit is") != std::string::npos;
 }
@@ -56,7 +56,7 @@ struct List {
     std::unique_ptr<Object[]> objects;
     int count = 0;
     bool read = false;
-    bool isTooLarge = false; ///< for the memory limit: the array is there, though not all that belongs into it
+    bool isTooLarge = false; ///< for the memory limit: the array exists, though it is incomplete
 
     List(Tarnell::Fbx::TnFbxReadInfo& info,
          bool (Tarnell::Fbx::Fbx::*reader)(Tarnell::Fbx::TnFbxReadInfo&, Object**, int&) const) {

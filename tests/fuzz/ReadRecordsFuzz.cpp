@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Any bytes give a record tree or a sentence. Every number of a tree can be read in every type, twice with the same
+// Any bytes give a record tree or a reason. Every number of a tree can be read in every type, twice with the same
 // result, and only a compressed array may turn out to be corrupt: all else was checked when the file was read.
 #include <algorithm>
 #include <cstdint>
@@ -19,7 +19,7 @@ using namespace fbxsdk::detail;
 
 namespace {
 
-/// More would only cost time.
+/// More would only take time.
 constexpr std::size_t kNumbersRead = 1 << 16;
 
 void require(bool holds, const char* what) {

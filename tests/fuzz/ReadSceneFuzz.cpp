@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Any bytes give a sound scene or a sentence: the node tree is a tree, attributes and nodes know each other, polygons
-// tell the same from every side, and everything can be converted, evaluated and read.
+// Any bytes give a valid scene or a reason: the node tree is a tree, attributes and nodes refer to each other, the
+// functions of polygons are consistent, and everything can be converted, evaluated and read.
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
@@ -20,7 +20,7 @@ namespace {
 
 using namespace fbxsdk;
 
-/// More would only cost time.
+/// More would only take time.
 constexpr int kNodesRead = 300;
 constexpr int kCornersRead = 2000;
 

@@ -2,13 +2,13 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Runs a fuzz target without a fuzzer: over the files it is given, over those in the folders it is given, and over
-// mutations of each, which depend on nothing but the file's name and bytes.
+// mutations of each, which depend only on the file's name and bytes.
 //
 //     fuzz_Name [--mutations COUNT] PATH...
 //     fuzz_Name [--mutations COUNT] --corpus FOLDER
 //
 // The second form takes a folder of real files, $TARNELL_CORPUS rather than the one named, and of these 30 binary and
-// 30 ASCII ones, which are also cut off in 100 places each. Without such a folder it says so and ends with 77.
+// 30 ASCII ones, which are also truncated in 100 places each. Without such a folder it says so and ends with 77.
 #include <algorithm>
 #include <cstdint>
 #include <cstdio>
@@ -62,7 +62,7 @@ std::uint64_t hash(const std::string& text) {
     return value;
 }
 
-/// One small accident: a byte changed, a number made extreme, a piece doubled, dropped or moved, the end cut off.
+/// One small mutation: a byte changed, a number made extreme, a part doubled, dropped or moved, the end truncated.
 void mutate(std::string& bytes, Random& random) {
     if (bytes.empty()) {
         return;
@@ -106,7 +106,7 @@ void runMutations(const fs::path& path, const std::string& original, int count) 
 
 constexpr std::size_t kCorpusFilesPerContainer = 30;
 constexpr std::size_t kCuts = 100;
-/// Large files only cost time: their damage is that of small ones.
+/// Large files only take time: their damage is that of small ones.
 constexpr std::size_t kLargestCorpusFile = 300000;
 constexpr int kSkipped = 77;
 

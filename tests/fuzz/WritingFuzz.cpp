@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Any value objects, however contradictory, are written or refused with a reason: in every version, as text and as
-// binary. Nothing half written stays, every file that is written can be read, and what was read can be written again.
+// binary. No incomplete file stays, every file that is written can be read, and what was read can be written again.
 //
 // The bytes of an input are the choices by which the objects are made.
 #include "fuzz/FuzzSupport.h"
@@ -34,7 +34,7 @@ constexpr int kMostObjects = 3;
 constexpr int kMostSamples = 6;
 constexpr int kMostSets = 4;
 
-/// Choices from bytes, and zeros behind the last one.
+/// Choices from bytes, and zeros after the last one.
 class Choices {
 public:
     explicit Choices(std::span<const std::uint8_t> bytes) : mLeft(bytes) {}
@@ -135,7 +135,7 @@ void fill(TnFbxLight& object, Choices& choices) {
     object.setDecayType(static_cast<TnFbxLight::EFbxLightDecayType>(choices.integer()));
 }
 
-/// Polygons that have other corners than the mesh, corners at points that there are not, sets of too few points.
+/// Polygons that have other corners than the mesh, corners at missing points, sets of too few points.
 void fill(TnFbxMesh& mesh, Choices& choices) {
     fill(static_cast<TnFbxTransform&>(mesh), choices);
     const int polygons = choices.below(5), points = choices.below(9), corners = choices.below(17);
@@ -214,7 +214,7 @@ int countOf(const std::vector<Object*>& pointers) {
     return static_cast<int>(std::count_if(pointers.begin(), pointers.end(), [](const Object* o) { return o; }));
 }
 
-/// What a file of the scene has.
+/// The content of a file of the scene.
 struct Copy {
     List<TnFbxCamera> cameras;
     List<TnFbxLight> lights;
@@ -239,7 +239,7 @@ TnFbxReadInfo readInfo(const std::string& file) {
     return info;
 }
 
-/// Position and scale come back as they are; a zero may lose its sign. Text has no spelling for what is not finite.
+/// Position and scale are read back unchanged; a zero may lose its sign. ASCII has no spelling for what is not finite.
 void requireSamePlace(const TnFbxTransform& written, const TnFbxTransform& read, bool ascii) {
     using Channel = TnFbxTransform::EFbxTransformChannelType;
     for (const int first : {TnFbxTransform::kFbxTransformPositionX, TnFbxTransform::kFbxTransformScaleX}) {
@@ -252,7 +252,7 @@ void requireSamePlace(const TnFbxTransform& written, const TnFbxTransform& read,
     }
 }
 
-/// The objects of a kind are from some place in the copy on, in order.
+/// The objects of a kind are consecutive in the copy, in order.
 template <class Object, class Read>
 void requireSamePlaces(const std::vector<Object*>& written, const List<Read>& copy, int from, bool ascii) {
     for (const Object* object : written) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Each kind is a line of objects and connections that is repeated, and what they have in common.
+// Each kind is a line of objects and connections that is repeated, and a common part.
 #include "GrowingFiles.h"
 
 #include <initializer_list>
@@ -79,7 +79,7 @@ std::string repeated(File file, int count, Each each) {
     return file.text();
 }
 
-/// The scene that deformers need: a model with a mesh.
+/// The scene for deformers: a model with a mesh.
 File withMesh() { return File().model(10, "m", "Mesh").mesh(11, 10); }
 
 std::string nulls(int count) {

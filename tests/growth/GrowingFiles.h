@@ -14,7 +14,7 @@ struct Kind {
     std::string (*file)(int count); ///< an ASCII file of 7.4
 };
 
-/// Every kind of object, and every way in which many of them can hang on one.
+/// Every kind of object, and every way in which many of them can be connected to one.
 const std::vector<Kind>& kinds();
 
 } // namespace growth

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Twice the objects are twice the work, or little more: every kind of object and connection, read, written, shown and
+// Twice the objects take twice the work, or little more: every kind of object and connection, read, written, shown and
 // converted at n, 2n and 4n. Work is counted in basic blocks, so the numbers are the same in every run.
 #include "GrowingFiles.h"
 
@@ -26,12 +26,12 @@ namespace {
 
 std::uint64_t gSteps = 0;
 
-/// What a library function does in one step.
+/// The work of a library function per step.
 constexpr std::size_t kBytesPerStep = 16;
 
 } // namespace
 
-// Called by every basic block of what is measured, and by the linker in place of functions that walk over bytes.
+// Called by every basic block of the measured code, and linked in place of functions that process bytes.
 extern "C" {
 // NOLINTBEGIN(bugprone-reserved-identifier): the names are the compiler's and the linker's
 void __sanitizer_cov_trace_pc() { ++gSteps; }
@@ -152,7 +152,7 @@ int dumpOf(const std::string& file) {
     return tool::dump(options);
 }
 
-/// Findings and differences are none of a failure.
+/// Findings and differences are not failures.
 bool cameraLintAndDiffRun(const std::string& file) {
     tool::CameraOptions camera;
     tool::LintOptions lint;
@@ -162,14 +162,14 @@ bool cameraLintAndDiffRun(const std::string& file) {
     return tool::camera(camera) == 0 && tool::lint(lint) <= 1 && tool::diff(diff) == 0;
 }
 
-/// Runs works on a file of a kind and keeps what each costs.
+/// Runs works on a file of a kind and records the cost of each.
 class Measurement {
 public:
     Measurement(const growth::Kind& kind, int count)
         : mFile(mFolder.write("in.fbx", kind.file(count))), mBinary(mFolder.path() + "/7.fbx"),
           mOld(mFolder.path() + "/6.fbx"), mOut(mFolder.path() + "/out.fbx") {}
 
-    /// Works that are little more than a walk over all objects.
+    /// Works that are little more than a traversal of all objects.
     std::vector<Cost> ofWalks() {
         {
             std::unique_ptr<LoadedScene> scene;
@@ -210,7 +210,7 @@ using Works = std::vector<Cost> (Measurement::*)();
 
 void expectGrowth(const growth::Kind& kind, Works works, int count) {
     const auto costs = [&](int number) { return (Measurement(kind, number).*works)(); };
-    costs(1); // what is worked out once per process
+    costs(1); // what is computed once per process
     const std::vector<Cost> once = costs(count), twice = costs(2 * count), fourTimes = costs(4 * count);
     for (std::size_t i = 0; i < once.size(); ++i) {
         const double first = std::log2(static_cast<double>(twice[i].steps) / static_cast<double>(once[i].steps));

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What assimp sees in the files.
+// What assimp reads from the files.
 #include <assimp/Importer.hpp>
 #include <assimp/config.h>
 #include <assimp/scene.h>
@@ -20,7 +20,7 @@ namespace {
 
 json listed(const aiVector3D& v) { return {v.x, v.y, v.z}; }
 
-/// The key that stands at the time, or the mixture of those around it.
+/// The key at the time, or the interpolation of those around it.
 aiVector3D valueAt(const aiVectorKey* keys, unsigned count, double time) {
     const auto* const next =
         std::lower_bound(keys, keys + count, time, [](const aiVectorKey& key, double t) { return key.mTime < t; });
@@ -45,7 +45,7 @@ public:
     }
 
 private:
-    // Nodes that assimp puts between a node and its parent are named after the node, with this in between.
+    // Nodes that assimp inserts between a node and its parent are named after the node, with this in between.
     static constexpr const char* kHelper = "_$AssimpFbx$_";
 
     void visit(const aiNode& node) {

@@ -1,10 +1,10 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Writes the files that the peers open, and beside them what a peer must find in each: worked out here from the values
-// that went in, without the library.
+// Writes the files that the peers open, and next to them what a peer must find in each: computed here from the values
+// that are written, without the library.
 //   interop_samples FOLDER compatible|faithful
-// Faithful files have meshes with a transform of their own, too, which others leave out.
+// Faithful files have meshes with a transform of their own, too, which others omit.
 #include <Fbx.h>
 #include <TnFbxCamera.h>
 #include <TnFbxError.h>
@@ -56,7 +56,7 @@ void animate(TnFbxTransform& object, Channel first, const Path& path) {
     }
 }
 
-/// Turns about one axis, in degrees; y is the axis of the second index, and so on.
+/// Rotates about one axis, in degrees; y is the axis of the second index, and so on.
 Vector turned(const Vector& v, int axis, double degrees) {
     const double angle = degrees * std::acos(-1.0) / 180, c = std::cos(angle), s = std::sin(angle);
     const auto i = static_cast<std::size_t>((axis + 1) % 3), j = static_cast<std::size_t>((axis + 2) % 3);
@@ -66,7 +66,7 @@ Vector turned(const Vector& v, int axis, double degrees) {
     return result;
 }
 
-/// The first axis of the order turns first.
+/// The first axis of the order is applied first.
 Vector rotated(Vector v, const Triple& degrees, const std::array<int, 3>& order) {
     for (const int axis : order)
         v = turned(v, axis, static_cast<double>(degrees[static_cast<std::size_t>(axis)]));
@@ -75,7 +75,7 @@ Vector rotated(Vector v, const Triple& degrees, const std::array<int, 3>& order)
 
 constexpr std::array<int, 3> kOrderXyz = {0, 1, 2}, kOrderZxy = {2, 0, 1}, kOrderYzx = {1, 2, 0};
 
-/// What is expected of one object: where it is at each frame, and where it looks.
+/// The expected values of one object: its position at each frame, and its direction.
 json placed(const std::string& name, const std::string& kind, const Path& position, const Path& rotation,
             const std::array<int, 3>& order) {
     json object = {{"name", name}, {"kind", kind}};
@@ -88,7 +88,7 @@ json placed(const std::string& name, const std::string& kind, const Path& positi
     return object;
 }
 
-/// Everything that goes into one file.
+/// The content of one file.
 struct Sample {
     TnFbxCamera camera;
     std::vector<TnFbxLight> lights = std::vector<TnFbxLight>(3);
@@ -131,7 +131,7 @@ void addLight(Sample& sample, TnFbxLight& light, const char* name, TnFbxLight::E
               const Triple& colour, float intensity) {
     light.setName(name);
     light.setLightType(type);
-    // Along all axes: three.js puts spot and directional lights elsewhere along those without keys.
+    // Along all axes: three.js misplaces spot and directional lights along those without keys.
     const Path position = [type](float k) {
         return Triple{-4.0F - 0.125F * k, 6.0F + 0.25F * k, 3.0F * static_cast<float>(type) + 0.5F * k};
     };
@@ -219,7 +219,7 @@ void addBox(Sample& sample, TnFbxMesh& mesh, const char* name, int sets) {
     sample.expected["objects"].push_back(object);
 }
 
-/// Lets a mesh move, turn and be as large as it is, and says where its points are then.
+/// Makes a mesh move, rotate and be scaled, and computes where its points are then.
 void place(Sample& sample, TnFbxMesh& mesh, const Path& position, const Path& rotation, const Triple& scale) {
     animate(mesh, Channel::kFbxTransformPositionX, position);
     animate(mesh, Channel::kFbxTransformRotationX, rotation);
@@ -299,13 +299,13 @@ bool write(const std::string& folder, const Layout& layout, bool ascii, bool fai
     info.setAnimationStackName(stackName(faithful));
     if (faithful) {
         info.setFidelity(kFbxFidelityFaithful);
-        info.setComputeCameraRotation(false); // the rotations say where the camera looks
+        info.setComputeCameraRotation(false); // the rotations determine the cameras' directions
     }
     info.setFileFormat(ascii);
     info.setFPS(kRate);
     info.setStartFrame(kFirst);
     info.setEndFrame(kLast);
-    // Point caches that another program can check are written beside the binary files.
+    // Point caches that another program can check are written next to the binary files.
     info.setMayaVertexCacheFormat(ascii);
     info.setCompatibilityVersion(layout.version);
     const Fbx fbx;

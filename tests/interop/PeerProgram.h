@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the programs that open our files with a peer have in common: PROGRAM SAMPLES OUT
-// Each file of SAMPLES/expected.json is looked at; what is seen of it goes into OUT, one JSON object per file.
+// The common part of the programs that open our files with a peer: PROGRAM SAMPLES OUT
+// Each file of SAMPLES/expected.json is opened; its content goes into OUT, one JSON object per file.
 #pragma once
 
 #include <nlohmann/json.hpp>
@@ -13,11 +13,11 @@
 #include <functional>
 #include <string>
 
-/// Opens a file. What it shows; null after a complaint on standard error.
+/// Opens a file and returns its content; null after a message on standard error.
 using LookAtFile = std::function<nlohmann::json(const std::filesystem::path& file, const nlohmann::json& expected)>;
 
 /// The exit status of the program: 0 when every file was opened, 1 when one was not, 2 for wrong usage. Files of
-/// versions before the peer's oldest one are left out.
+/// versions before the peer's oldest one are skipped.
 inline int runPeer(int argumentCount, char** arguments, const LookAtFile& look, int oldestVersion = 0) {
     if (argumentCount != 3) {
         std::fprintf(stderr, "usage: %s SAMPLES OUT\n", arguments[0]);

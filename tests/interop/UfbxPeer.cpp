@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What ufbx sees in the files. It opens every version in both encodings, and evaluates scenes.
+// What ufbx reads from the files. It opens every version in both encodings, and evaluates scenes.
 #include <ufbx.h>
 
 #include "PeerProgram.h"
@@ -68,7 +68,7 @@ void describeMesh(const ufbx_node& node, json& object) {
     }
 }
 
-/// What does not depend on the time.
+/// The values that do not depend on the time.
 json describe(const ufbx_node& node) {
     json object = {{"name", textOf(node.name)}, {"kind", kindOf(node)}};
     if (node.camera) {
@@ -87,7 +87,7 @@ json describe(const ufbx_node& node) {
     return object;
 }
 
-/// Where the node is, and what it shows, in a scene that was evaluated at the frame.
+/// The node's placement and other values, in a scene that was evaluated at the frame.
 void describeAt(const ufbx_node& node, const std::string& frame, json& object) {
     if (const ufbx_mesh* const mesh = node.mesh) {
         json& placed = object["placed"][frame];
@@ -107,7 +107,7 @@ void describeAt(const ufbx_node& node, const std::string& frame, json& object) {
         object["focalLengths"][frame] = node.camera->focal_length_mm;
 }
 
-/// Null, and the reason on standard error, when ufbx gives up.
+/// Null, and the reason on standard error, when ufbx fails.
 Scene told(ufbx_scene* scene, const std::string& file, const ufbx_error& error) {
     if (!scene)
         std::fprintf(stderr, "%s: %s\n", file.c_str(), error.description.data);

@@ -19,7 +19,7 @@ TOLERANCE = 2e-5
 TOLERANCE_OF_TIMES = 2e-4
 ANIMATED = ["positions", "directions"]
 # Blender 3.4 turns post-rotations the wrong way round, in files of every writer: what looks forward in them looks
-# backward there. Whether it is the right one of the two, three.js tells.
+# backward there. Whether it is the right one of the two is verified with three.js.
 BACKWARD = ["positions", "axes"]
 # Per peer: the versions and encodings that it opens, and what it reports of each kind.
 PEERS = {

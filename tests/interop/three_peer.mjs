@@ -9,7 +9,7 @@ import { join } from 'node:path';
 import { AnimationMixer, LoopOnce, Vector3 } from 'three';
 import { FBXLoader } from 'three/examples/jsm/loaders/FBXLoader.js';
 
-// The loader asks for images in the way of a browser; our files have none.
+// The loader requests images as in a browser; our files have none.
 globalThis.window = globalThis;
 globalThis.self = globalThis;
 

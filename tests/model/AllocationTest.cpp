@@ -1,10 +1,10 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the value classes allocate, and what they hold when there is no memory to be had.
+// What the value classes allocate, and their state when an allocation fails.
 //
 // The allocation functions of this executable are replaced by ones that count, and that refuse what is larger than a
-// limit, so that a gap of billions of frames can be asked for on any machine.
+// limit, so that a gap of billions of frames can be requested on any machine.
 #include "TnFbxCamera.h"
 #include "TnFbxMesh.h"
 
@@ -57,7 +57,7 @@ using test::range;
 using test::samplesOf;
 using Samples = std::vector<float>;
 
-/// Refuses allocations above a limit as long as it lives.
+/// Refuses allocations above a limit for its lifetime.
 class AllocationLimit {
 public:
     explicit AllocationLimit(std::size_t bytes) { gAllocationLimit = bytes; }

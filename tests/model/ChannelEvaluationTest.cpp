@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A channel between its samples, at its ends, and at frames that no int or no float can tell apart.
+// A channel between its samples, at its ends, and at frames that an int or a float cannot represent.
 #include "TnFbxChannel.h"
 
 #include "ModelValues.h"
@@ -65,7 +65,7 @@ TEST(ChannelEvaluation, ExtrapolatesFromTheRightBelowZero) {
     const TnFbxChannel channel = channelOver(-5, {10.0f, 20.0f, 60.0f});
 
     EXPECT_EQ(channel.getAnimatedValue(-4.5f), 0.0f);  // 20 − 0.5·(60 − 20), not the 15 between −5 and −4
-    EXPECT_EQ(channel.getAnimatedValue(-3.5f), 60.0f); // −3 has no right neighbour
+    EXPECT_EQ(channel.getAnimatedValue(-3.5f), 60.0f); // −3 has no sample to its right
     EXPECT_EQ(channel.getAnimatedValue(-5.0f), 10.0f);
     EXPECT_EQ(channel.getAnimatedValue(-4.0f), 20.0f);
 }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What transforms, cameras, lights and markers have in common: channels behind an enumeration, with the same members
+// The common part of transforms, cameras, lights and markers: channels behind an enumeration, with the same members
 // under almost the same names. Every behaviour is tested on all four, against tables written out by hand.
 #include "TnFbxCamera.h"
 #include "TnFbxLight.h"
@@ -363,7 +363,7 @@ TYPED_TEST(ChannelOwner, ACopyHasEveryChannelAndTheName) {
     EXPECT_EQ(copy.getName(), "a");
 }
 
-/// Those that hand out the channel objects; markers do not.
+/// Those that give access to the channel objects; markers do not.
 template <typename Owner>
 class ChannelObjectOwner : public testing::Test {};
 

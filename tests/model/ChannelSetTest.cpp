@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The check that a channel table is complete and in order. It runs at compile time, so what it refuses is shown here.
+// The check that a channel table is complete and in order. It runs at compile time; here its result is tested.
 #include "model/ChannelSet.h"
 
 #include <gtest/gtest.h>

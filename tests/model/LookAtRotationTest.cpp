@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The look-at conversion: closed forms, what it does to its inputs, and a hundred thousand cameras rebuilt from their
+// The look-at conversion: closed forms, its effect on its inputs, and a hundred thousand cameras rebuilt from their
 // angles.
 #include "TnFbxCamera.h"
 
@@ -21,7 +21,7 @@ using test::range;
 using Floats = std::array<float, 3>;
 using Doubles = std::array<double, 3>;
 
-/// One conversion: its angles, and what it left in its inputs.
+/// One conversion: its angles, and the final values of its inputs.
 struct Result {
     Floats angles;
     Floats position, lookAt, up;
@@ -176,7 +176,7 @@ TEST(LookAtRotation, LeavesTheRolledUpVectorBehind) {
 TEST(LookAtRotation, RoundsEveryStepToSinglePrecision) {
     const Result result = convert({1.1f, 2.2f, 3.3f}, {-4.4f, 6.6f, -8.8f}, {0.3f, 1.0f, 0.2f}, 33.3f);
 
-    // worked out apart from the library, one rounded operation at a time
+    // computed independently of the library, one rounded operation at a time
     EXPECT_EQ(result.lookAt, (Floats{-0x1.6p+2f, 0x1.199998p+2f, -0x1.833334p+3f}));
     EXPECT_EQ(result.up, (Floats{0x1.71bf0cp-1f, 0x1.5fe28ep-1f, -0x1.40ddd8p-4f}));
     // the last bits of an arc tangent are the C library's own
@@ -205,7 +205,7 @@ Doubles cross(const Doubles& a, const Doubles& b) {
     return {a[1] * b[2] - a[2] * b[1], a[2] * b[0] - a[0] * b[2], a[0] * b[1] - a[1] * b[0]};
 }
 
-/// A vector turned by Euler angles in degrees: about Z, then about X, then about Y.
+/// A vector rotated by Euler angles in degrees: about Z, then about X, then about Y.
 Doubles rotated(const Doubles& v, const Floats& degrees) {
     const double radians = 3.14159265358979323846 / 180.0;
     const double sx = std::sin(degrees[0] * radians), cx = std::cos(degrees[0] * radians);

@@ -48,7 +48,7 @@ TEST(MeshArrays, KeepsWhatIsWrittenIntoThem) {
         arrays.addUV({0, 0});
         arrays.addUV({4, 5});
         arrays.colours()[1] = {6, 7, 8, 9};
-        EXPECT_EQ(arrays.colours()[1].green, 7); // asking again changes nothing
+        EXPECT_EQ(arrays.colours()[1].green, 7); // requesting it again changes nothing
     }
 
     EXPECT_EQ(mesh.getPolygonVertexSize(0), 3);

@@ -33,7 +33,7 @@ inline TnFbxChannel channelOver(int startFrame, const std::vector<float>& values
     return channel;
 }
 
-/// What the channel gives at every whole frame of its range.
+/// The channel's value at every whole frame of its range.
 inline std::vector<float> samplesOf(const TnFbxChannel& channel) {
     std::vector<float> samples;
     for (int frame = channel.getTime().getStartFrame(); frame <= channel.getTime().getEndFrame(); ++frame) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The camera's modes, and what its lifecycle leaves alone. Its channels are tested with those of all owners, its
+// The camera's modes, and what its lifecycle leaves unchanged. Its channels are tested with those of all owners, its
 // look-at conversion on its own.
 #include "TnFbxCamera.h"
 

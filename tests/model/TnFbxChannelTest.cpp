@@ -337,11 +337,11 @@ TEST(TnFbxChannel, ACopyIsIndependentOfItsSource) {
     expectFilled(copy);
 }
 
-// ---- Samples that are all equal are kept as one; nobody must be able to tell ----
+// ---- Samples that are all equal are stored as one; this must not be observable ----
 
 std::uint32_t bitsOf(float value) { return std::bit_cast<std::uint32_t>(value); }
 
-/// The rules for samples, written down a second time with every sample in its place.
+/// The rules for samples, implemented a second time with every sample stored separately.
 class PlainSamples {
 public:
     void set(int start, const Samples& values) {

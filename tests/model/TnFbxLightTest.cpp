@@ -1,7 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The light's type and decay, and what its lifecycle leaves alone. Its channels are tested with those of all owners.
+// The light's type and decay, and what its lifecycle leaves unchanged. Its channels are tested with those of all
+// owners.
 #include "TnFbxLight.h"
 
 #include "TransformOwner.h"

@@ -1,7 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The marker's size and look, and what its lifecycle leaves alone. Its channels are tested with those of all owners.
+// The marker's size and look, and what its lifecycle leaves unchanged. Its channels are tested with those of all
+// owners.
 #include "TnFbxMarker.h"
 
 #include "TransformOwner.h"

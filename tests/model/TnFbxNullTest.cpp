@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The null's size and look, and what its lifecycle leaves alone.
+// The null's size and look, and what its lifecycle leaves unchanged.
 #include "TnFbxNull.h"
 
 #include "TransformOwner.h"

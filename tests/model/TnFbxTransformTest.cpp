@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The transform's orders, and what its lifecycle leaves alone. Its channels are tested with those of all owners.
+// The transform's orders, and what its lifecycle leaves unchanged. Its channels are tested with those of all owners.
 #include "TnFbxTransform.h"
 
 #include "ModelValues.h"

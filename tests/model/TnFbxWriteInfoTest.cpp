@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The write options: defaults, storage, and the one option that assignment leaves out.
+// The write options: defaults, storage, and the one option that assignment does not copy.
 #include "TnFbxWriteInfo.h"
 
 #include "ModelValues.h"

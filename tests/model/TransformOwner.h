@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A transform part that tests can recognise, for the rule that objects keep theirs.
+// A recognisable transform part, for the rule that objects keep theirs.
 #pragma once
 
 #include "TnFbxTransform.h"

@@ -35,7 +35,7 @@ function write(name, ...files) {
   return page;
 }
 
-/** Opens a page, and hands out what it complained of and asked for. */
+/** Opens a page, and returns its errors and requests. */
 async function open(file, { theme = "light", width = 1280, height = 860 } = {}) {
   const page = await browser.newPage();
   const complaints = [];
@@ -74,7 +74,7 @@ function directionOf(camera, place) {
   return direction;
 }
 
-/** The camera that the picture is drawn with stands and looks as the faithful one; hands out where it looks. */
+/** The camera of the picture has the placement of the faithful one; returns its direction. */
 async function assertDrawn(page, camera, place) {
   const drawn = await page.$eval(".status", (status) => [status.dataset.position, status.dataset.direction].map((text) => text.split(" ").map(Number)));
   const position = ["X", "Y", "Z"].map((axis) => at(camera.transform[`position${axis}`], place));

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Blend shapes: which targets count at a percentage, and what they do to points.
+// Blend shapes: which targets are used at a percentage, and their effect on points.
 #include "sdk/BlendShapeWeights.h"
 
 #include "DeformationScenes.h"

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Files that Blender exported, read through the facade. The expected numbers are those of the script that made them,
-// with Blender's metres and Z up turned into centimetres and Y up.
+// with Blender's metres and Z up converted to centimetres and Y up.
 #include "support/FacadeReads.h"
 #include "support/SceneBuilders.h"
 
@@ -78,7 +78,7 @@ TEST(BlenderFile, GivesLightsAndEmpties) {
     EXPECT_THAT(FacadeRead<TnFbxNull>(worldRead("cameras_and_lights_7400_binary.fbx")).names(), ElementsAre("locator"));
 }
 
-/// The strip's pairs of points at the heights 0 to 4 m; those above 2 m turn with the upper bone.
+/// The strip's pairs of points at the heights 0 to 4 m; those above 2 m rotate with the upper bone.
 void expectStrip(const TnFbxMesh& mesh, double degrees, float scale) {
     const double radians = degrees * M_PI / 180.0;
     // Meshes are read at a time in single precision, which makes 4e-3 cm of a bone of this speed.
@@ -106,7 +106,7 @@ TEST(BlenderFile, GivesASkinnedMeshWhereItsBonesTakeIt) {
     }
 }
 
-// kept: skinned points are in the world; the transform of the node, here a scale by 100 and a turn from Z up, is
+// kept: skinned points are in the world; the transform of the node, here a scale by 100 and a rotation from Z up, is
 // applied to them all the same when points are to be transformed
 TEST(BlenderFile, TransformsSkinnedPointsOnceMore) {
     TnFbxReadInfo info = worldRead("skin_7400_binary.fbx");

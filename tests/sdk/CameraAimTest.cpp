@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Where cameras look: at targets and points of interest, with roll, and on which frames that is worked out.
+// The direction of cameras: at targets and points of interest, with roll, and on which frames it is computed.
 #include "CameraScenes.h"
 #include "support/MemoryLimitScope.h"
 
@@ -116,10 +116,10 @@ TEST(CameraAim, GivesAComputedRotationTheRateOfItsLastAnimatedIngredient) {
     TestScene scene(0, 2);
     fbxsdk::FbxNode* node = addCamera(scene);
     scene.key(node->LclTranslation, "X", {{0, 0.0f}, {2, 20.0f}});
-    Camera camera; // the up vector is never sampled: these are the samples that the object brings
+    Camera camera; // the up vector is never sampled: these are the samples that the object had before
     camera.setValueAt(Camera::kFbxCameraUpPositionX, timeRecord(1, 2, 60.0f), {0.0f, 0.0f});
     camera.setValueAt(Camera::kFbxCameraUpPositionY, timeRecord(1, 5, 30.0f), Samples(5, 1.0f));
-    camera.setValueAt(Camera::kFbxCameraFarPlane, timeRecord(-9, 9, 120.0f), Samples(19, 1.0f)); // no ingredient
+    camera.setValueAt(Camera::kFbxCameraFarPlane, timeRecord(-9, 9, 120.0f), Samples(19, 1.0f)); // no input
 
     EXPECT_TRUE(readInto(scene, node, camera, {false, true}));
     test::expectRange(camera.getTransformTime(kRotationX), 0, 5, 30.0f);
@@ -261,7 +261,7 @@ TEST(CameraAim, SurvivesAnAimThatIsNoNumber) {
     readCamera(scene, node, {false, true});
 }
 
-/// A camera that brings samples at both ends of the range of frames: so many, and the same number at the other end.
+/// A camera with samples at both ends of the range of frames: that many, and the same number at the other end.
 Camera cameraOfAllFrames(const std::vector<float>& samples) {
     const int count = static_cast<int>(samples.size());
     Camera camera;

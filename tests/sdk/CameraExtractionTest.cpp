@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Cameras out of nodes: their placement, lens and film.
+// Reading cameras from nodes: their placement, lens and film.
 #include "CameraScenes.h"
 
 #include "TnFbxError.h"

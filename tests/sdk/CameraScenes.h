@@ -57,7 +57,7 @@ inline TnFbxTime timeRecord(int startFrame, int endFrame, float rate) {
     return time;
 }
 
-/// A camera whose modes are not those of a new one nor any that is read.
+/// A camera whose modes are neither those of a new one nor any that is read.
 inline TnFbxCamera cameraInOtherModes() {
     TnFbxCamera camera;
     camera.setApertureMode(TnFbxCamera::kFbxApertureVertical);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Writing cameras: film, planes, the lens by aperture mode, film offset and the turn of the node.
+// Writing cameras: film, planes, the lens by aperture mode, film offset and the rotation of the node.
 #include "support/WritingBuilders.h"
 
 #include "TnFbxError.h"

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes of a few points with what deforms them, and their deformed points.
+// Meshes of a few points with their deformers, and their deformed points.
 #pragma once
 
 #include "support/SceneBuilders.h"

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// "Fbx.h" is the only header of the library here: what it hands out can be used and deleted without another one.
+// "Fbx.h" is the only header of the library here: what it returns can be used and deleted without another one.
 #include "Fbx.h"
 
 #include <memory>

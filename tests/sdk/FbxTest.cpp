@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The facade: what each read does with its options, its outputs and a file, from one end to the other.
+// The facade: the effect of each read's options, its outputs and its file, in complete calls.
 #include "Fbx.h"
 
 #include "FbxSdk.h"
@@ -51,7 +51,7 @@ std::string textOf(const char* name) {
     return {std::istreambuf_iterator<char>(in), {}};
 }
 
-/// Where a part of a file starts, which is there once.
+/// Where a part of a file starts, which occurs once.
 std::size_t startOf(const std::string& text, const std::string& part) {
     const std::size_t start = text.find(part);
     EXPECT_NE(start, std::string::npos) << part;
@@ -67,7 +67,7 @@ std::string edited(std::string text, const std::string& part, const std::string&
 template <class Object>
 using Reader = bool (Fbx::*)(TnFbxReadInfo&, Object**, int&) const;
 
-/// What one read hands out; owns the array as a host does.
+/// The result of one read; owns the array as a host does.
 template <class Object>
 struct Read {
     Read(Reader<Object> reader, TnFbxReadInfo info) {
@@ -187,7 +187,7 @@ TEST(FbxReading, FailsForAFileThatStopsWithinABlock) {
 TEST(FbxReading, TakesAFileThatStopsBetweenBlocksForAWholeOne) {
     const support::TemporaryFolder folder;
     const std::string whole = textOf("mesh_7400_ascii.fbx");
-    for (const char* next : {"Objects:", "Connections:"}) { // no mesh yet, and none that stands below the root
+    for (const char* next : {"Objects:", "Connections:"}) { // no mesh yet, and none below the root
         TnFbxReadInfo info = optionsFor("");
         info.setFileName(folder.write("cut.fbx", whole.substr(0, startOf(whole, next))));
 
@@ -251,7 +251,7 @@ TEST(FbxReading, ByNameFindsTheNodesOfTheKindAndNoOthers) {
     struct Row {
         const char* file;
         const char* name;
-        Names kinds; // of which the node is an object
+        Names kinds; // which belongs to the node
     };
     const Row rows[] = {{"mesh_7400_ascii.fbx", "shape", {"meshes", "transforms"}},
                         {"camera_7400_ascii.fbx", "shot", {"cameras"}},
@@ -322,7 +322,7 @@ TEST(FbxReading, ByNameHandsOutTheFirstOfSeveralThatBearIt) {
 
     EXPECT_TRUE(read.result) << lastError();
     ASSERT_EQ(read.names(), Names({"parent"}));
-    EXPECT_EQ(read.objects[0].getNullSize(), 25.0f); // the second has size 1 and stands at X 11
+    EXPECT_EQ(read.objects[0].getNullSize(), 25.0f); // the second has size 1 and is at X 11
     EXPECT_EQ(read.objects[0].getTransformValue(Transform::kFbxTransformPositionX), 1.0f);
 
     info.setAllObjects(true);
@@ -464,7 +464,7 @@ TEST(FbxReading, MakesMeshesOfNurbs) {
     EXPECT_GT(read.objects[0].getNumberOfPolygons(), 0);
 }
 
-// ---- Loading and counting for a context of the caller's ----
+// ---- Loading and counting for a caller's context ----
 
 TEST(FbxLoadScene, FillsTheContextAndConvertsGeometry) {
     FbxSdk sdk;
@@ -485,7 +485,7 @@ TEST(FbxLoadScene, LeavesTheContextWithoutASceneAfterAFailure) {
 }
 
 TEST(FbxObjectCount, IsTheNumberOfCandidatesWhenAllAreAskedFor) {
-    FbxSdk sdk; // no names are looked at
+    FbxSdk sdk; // names are not compared
     EXPECT_EQ(Fbx().getNumberOfObjects(5, true, 4, "", sdk), 5);
     EXPECT_EQ(Fbx().getNumberOfObjects(0, true, 4, "", sdk), 0);
     EXPECT_EQ(Fbx().getNumberOfObjects(-1, true, 4, "", sdk), 0);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Writing through the facade: what the options must name, what is left out, and what a failure leaves behind.
+// Writing through the facade: what the options must name, what is skipped, and the state after a failure.
 #include "support/FacadeReads.h"
 #include "support/SceneBuilders.h"
 #include "support/TemporaryFolder.h"
@@ -145,7 +145,7 @@ bool writeMovingMesh(const std::string& fileName) {
 
 TEST(FbxWriting, ThatFailsLeavesNoPointCacheThatWasNotThere) {
     TemporaryFolder folder;
-    fs::create_directories(folder.file("shot.fbx")); // a folder in the place of the file
+    fs::create_directories(folder.file("shot.fbx")); // a folder with the name of the file
 
     EXPECT_FALSE(writeMovingMesh(folder.file("shot.fbx")));
 

@@ -43,7 +43,7 @@ struct SaveScene : WrittenScene {
 
 bool isBinary(const std::string& bytes) { return bytes.rfind("Kaydara FBX Binary", 0) == 0; }
 
-/// What the head of a binary file says.
+/// The version in the header of a binary file.
 int versionOf(const std::string& bytes) {
     int version = 0;
     for (std::size_t i = 4; bytes.size() >= 27 && i-- > 0;) {

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Animation of hand-written files. All keys are multiples of four frames apart, at 24 frames per second where nothing
-// else is said.
+// Animation of hand-written files. All keys are multiples of four frames apart, at 24 frames per second unless
+// stated otherwise.
 //
 // Within a segment, at its part u, the Hermite cubic between two values a and b is
 //
@@ -291,7 +291,7 @@ TEST(FilmRateFixture, CountsFramesAtTheRateOfFilm) {
     FacadeRead<TnFbxNull> nulls(fixture("film_rate_7400_ascii.fbx"));
 
     expectRange(nulls["node"].getTransformTime(kX), 1001, 1003, kRate);
-    EXPECT_THAT(samplesOf(nulls["node"], kX), isNear({valueAt(1001), valueAt(1002), 2})); // held behind the last key
+    EXPECT_THAT(samplesOf(nulls["node"], kX), isNear({valueAt(1001), valueAt(1002), 2})); // held after the last key
 }
 
 TEST(CustomRateFixture, CountsFramesAtTheRateOfTheFile) {

@@ -27,11 +27,11 @@ class SkinOfEachGeneration : public testing::TestWithParam<const char*> {};
 INSTANTIATE_TEST_SUITE_P(Files, SkinOfEachGeneration,
                          testing::Values("skin_5800_ascii.fbx", "skin_6100_ascii.fbx", "skin_7400_ascii.fbx"));
 
-// The lower bone stands at (0,1,0), where it was bound. The upper one was bound at (0,2,0) and turns by 90° about Z: it
-// takes (x,y) to (2 − y, 2 + x). In the world the points were at
+// The lower bone is at (0,1,0), where it was bound. The upper one was bound at (0,2,0) and rotates by 90° about Z: it
+// maps (x,y) to (2 − y, 2 + x). In the world the points were at
 //     (0,1) on the lower bone alone,
-//     (0,3) on the upper one alone, which takes it to (−1,2),
-//     (1,2) on both alike: the middle between it and (0,3),
+//     (0,3) on the upper one alone, which moves it to (−1,2),
+//     (1,2) on both equally: the middle between it and (0,3),
 //     (0,4) with a quarter and three quarters: ¼ (0,4) + ¾ (−2,2).
 TEST_P(SkinOfEachGeneration, GivesThePointsInTheWorldWhereTheBonesTakeThem) {
     EXPECT_THAT(pointsAt(GetParam(), "body", 0.0f), isNear({0, 1, 0, -1, 2, 0, 0.5f, 2.5f, 0, -1.5f, 2.5f, 0}));
@@ -43,10 +43,10 @@ TEST_P(SkinOfEachGeneration, LeavesTheNodeWhereItIs) {
     EXPECT_EQ(test::positionOf(meshes["body"]), Samples({5, 0, 0}));
 }
 
-// The point (0,4,0) hangs on two bones. The lower one has moved by (1,0,0). The upper one was bound at (0,2,0), stands
-// at (1,2,0) and has turned by 90° about Z: it takes (x,y) to (1 − (y − 2), 2 + x).
+// The point (0,4,0) follows two bones. The lower one has moved by (1,0,0). The upper one was bound at (0,2,0), is
+// at (1,2,0) and has rotated by 90° about Z: it maps (x,y) to (1 − (y − 2), 2 + x).
 //
-// Additive, each has the half and moves what the one before has moved: the lower one to (½,4); the upper one takes that
+// Additive, each has half the weight and moves the result of the one before: the lower to (½,4); the upper maps that
 // to (−1,2½), and half of the way there is (−¼,3¼).
 // Of total one: ¼ (1,4) + ½ (−1,2) and the missing quarter of (0,4).
 TEST(LinkModesFixture, AddUpOrFillUpWithThePointItself) {
@@ -77,7 +77,7 @@ TEST(BlendShapeFixture, MovesByAShapeWithinItsMesh) {
     }
 }
 
-// ---- Caches. At frame f, the points 0, 1 and 2 stand at (p, f², number of the cache) ----
+// ---- Caches. At frame f, the points 0, 1 and 2 are at (p, f², number of the cache) ----
 
 Samples wave(float height, float cache) { return {0, height, cache, 1, height, cache, 2, height, cache}; }
 
@@ -112,7 +112,7 @@ TEST(CachesFixture, ThatAreNotThereLeaveThePointsAsTheyAre) {
     EXPECT_EQ(pointsAt("caches_7400_ascii.fbx", "lost", 1.0f), Samples({0, 0, 9, 1, 0, 9, 2, 0, 9}));
 }
 
-// kept: the range is in seconds; caches of Maya are asked where nothing else is animated
+// kept: the range is in seconds; caches of Maya are used where nothing else is animated
 TEST(CachesFixture, OfMayaGiveTheRangeOfTheFile) {
     float start = -1.0f, end = -1.0f;
     ASSERT_TRUE(Fbx().getAnimationFrameRange(fixture("caches_7400_ascii.fbx").c_str(), start, end)) << lastError();

@@ -20,14 +20,14 @@ using Names = std::vector<std::string>;
 
 inline std::string fixture(const char* name) { return std::string(TARNELL_TEST_DATA "/sdk/") + name; }
 
-/// Transforms in the world, points as they are.
+/// Global transforms, points unchanged.
 inline TnFbxReadInfo worldRead(const char* name) {
     TnFbxReadInfo info = localRead(fixture(name));
     info.setGlobalTransform(true);
     return info;
 }
 
-/// Meshes at a frame, their points as they are.
+/// Meshes at a frame, their points unchanged.
 inline TnFbxReadInfo readAtFrame(const char* name, float frame) {
     TnFbxReadInfo info = localRead(fixture(name));
     info.setFrame(frame);
@@ -62,7 +62,7 @@ inline Samples pointsOf(const TnFbxMesh& mesh) {
     return points;
 }
 
-/// The control points that the polygon vertices name, one polygon after the other.
+/// The control points of the polygon vertices, one polygon after the other.
 inline std::vector<int> pointIndicesOf(const TnFbxMesh& mesh) {
     std::vector<int> indices;
     for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
@@ -71,7 +71,7 @@ inline std::vector<int> pointIndicesOf(const TnFbxMesh& mesh) {
     return indices;
 }
 
-/// What differs by the rounding of single precision alone is the same.
+/// Values that differ only by the rounding of single precision are equal.
 inline auto isNear(const Samples& expected) { return testing::Pointwise(testing::FloatNear(1e-5f), expected); }
 
 } // namespace Tarnell::Fbx::test

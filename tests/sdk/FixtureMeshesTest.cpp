@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes of hand-written files: materials, mapping and reference modes, and the surfaces that become meshes.
+// Meshes of hand-written files: materials, mapping and reference modes, and the surfaces that are converted to meshes.
 #include "FixtureFiles.h"
 
 #include <cmath>
@@ -18,7 +18,7 @@ using test::Samples;
 using testing::ElementsAre;
 using testing::FloatNear;
 
-/// What all polygon vertices have, in one row.
+/// The values of all polygon vertices, in one row.
 Samples normalsOf(const TnFbxMesh& mesh) {
     Samples all;
     for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
@@ -42,7 +42,7 @@ Samples colourOf(const TnFbxMesh& mesh, int polygonVertex) {
     EXPECT_TRUE(mesh.getColour(polygonVertex, colour[0], colour[1], colour[2], colour[3]));
     return colour;
 }
-/// The red of all polygon vertices, where the other components say nothing.
+/// The red of all polygon vertices, where the other components are not of interest.
 Samples redsOf(const TnFbxMesh& mesh) {
     Samples all;
     for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
@@ -142,7 +142,7 @@ TEST(NurbsFormsFixture, ClosedAlongUEndsAtItsFirstPoints) {
     EXPECT_EQ(pointIndicesOf(mesh), kRoundTrip);
 }
 
-// Of degree 2 with even knots, the surface goes at every knot through the middle between two control points.
+// Of degree 2 with even knots, the surface passes at every knot through the middle between two control points.
 TEST(NurbsFormsFixture, PeriodicAlongURunsThroughTheMiddlesOfItsSides) {
     FacadeRead<TnFbxMesh> meshes(fixture("nurbs_forms_7400_ascii.fbx"));
     const TnFbxMesh& mesh = meshes["periodic"];
@@ -194,7 +194,7 @@ TEST(PatchesFixture, OfBezierRunThroughTheirOuterPoints) {
 }
 
 // In the middle between two points the weights of the four next ones are −1/16, 9/16, 9/16, −1/16. Beyond the ends
-// stand (0,−8) and (8,−8), so that the first middle is (−8, 72 + 8 − 8)/16, the second (64, 144)/16.
+// are (0,−8) and (8,−8), so that the first middle is (−8, 72 + 8 − 8)/16, the second (64, 144)/16.
 TEST(PatchesFixture, OfTheCardinalKindRunThroughAllTheirPoints) {
     const Samples curve = {0, 0, -0.5f, 4.5f, 0, 8, 4, 9, 8, 8, 8.5f, 4.5f, 8, 0};
     Samples expected;

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Nodes of hand-written files: where they stand, of which kind they are, what they are called, and what becomes of
-// files that contradict themselves.
+// Nodes of hand-written files: their placement, kinds and names, and the result for files
+// that are inconsistent.
 #include "FixtureFiles.h"
 
 namespace Tarnell::Fbx {
@@ -41,7 +41,7 @@ TEST(RigFixture, PlacesANodeByItsPivotsAndOffsets) {
     EXPECT_THAT(scaleOf(node), isNear({1, 2, 1}));
 }
 
-// The tip stands at (1,2,3) in its parent, whose rotation is Rpre · R · Rpost⁻¹ with Z before X in R: −90° about Y
+// The tip is at (1,2,3) in its parent, whose rotation is Rpre · R · Rpost⁻¹ with Z before X in R: −90° about Y
 // makes it (−3,2,1), 90° about Z (−2,−3,1), 90° about X (−2,−1,−3), and 90° about Z of the pre-rotation (1,−2,−3).
 TEST(RigFixture, TurnsByPreAndPostRotationInTheNodesOrder) {
     FacadeRead<TnFbxNull> nulls(worldRead("rig_7400_ascii.fbx"));
@@ -49,7 +49,7 @@ TEST(RigFixture, TurnsByPreAndPostRotationInTheNodesOrder) {
     EXPECT_THAT(positionOf(nulls["oriented tip"]), isNear({101, -2, -3}));
 }
 
-// Neither the pre- and post-rotation nor the order count: 90° about X makes (1,2,3) to (1,−3,2), about Z to (3,1,2).
+// Neither the pre- and post-rotation nor the order is used: 90° about X maps (1,2,3) to (1,−3,2), about Z to (3,1,2).
 TEST(RigFixture, TurnsInTheOrderXYZAloneWhenTheRotationIsNotActive) {
     FacadeRead<TnFbxNull> nulls(worldRead("rig_7400_ascii.fbx"));
 
@@ -64,14 +64,14 @@ TEST(RigFixture, GivesTheRotationAsItIsWhenReadLocally) {
     EXPECT_EQ(nulls["oriented"].getTransformRotationOrder(), TnFbxTransform::kFbxRotationOrderZYX);
 }
 
-// The parent stands at (10,0,0) and is twice as wide. Its children stand at (1,0,0) in it and turn by 90° about Z;
+// The parent is at (10,0,0) and is scaled by 2 in X. Its children are at (1,0,0) in it and rotated by 90° about Z;
 // their tips are at (1,1,0).
 TEST(InheritTypesFixture, ScaleBeforeAfterOrWithoutTheChildsRotation) {
     FacadeRead<TnFbxNull> nulls(worldRead("inherit_types_7400_ascii.fbx"));
 
-    EXPECT_THAT(positionOf(nulls["RrSs tip"]), isNear({11, 2, 0})); // wide (2,1,0), then turned (−1,2,0)
-    EXPECT_THAT(positionOf(nulls["RSrs tip"]), isNear({10, 1, 0})); // turned (−1,1,0), then wide (−2,1,0)
-    EXPECT_THAT(positionOf(nulls["Rrs tip"]), isNear({11, 1, 0}));  // turned alone
+    EXPECT_THAT(positionOf(nulls["RrSs tip"]), isNear({11, 2, 0})); // scaled (2,1,0), then rotated (−1,2,0)
+    EXPECT_THAT(positionOf(nulls["RSrs tip"]), isNear({10, 1, 0})); // rotated (−1,1,0), then scaled (−2,1,0)
+    EXPECT_THAT(positionOf(nulls["Rrs tip"]), isNear({11, 1, 0}));  // rotated only
 }
 
 TEST(InheritTypesFixture, PlaceTheChildAlikeAndScaleItOtherwise) {
@@ -82,11 +82,11 @@ TEST(InheritTypesFixture, PlaceTheChildAlikeAndScaleItOtherwise) {
         EXPECT_THAT(rotationOf(nulls[name]), isNear({0, 0, 90})) << name;
     }
     EXPECT_THAT(scaleOf(nulls["RrSs"]), isNear({2, 1, 1}));
-    EXPECT_THAT(scaleOf(nulls["RSrs"]), isNear({1, 2, 1})); // along what was Y before it turned
+    EXPECT_THAT(scaleOf(nulls["RSrs"]), isNear({1, 2, 1})); // along what was Y before its rotation
     EXPECT_THAT(scaleOf(nulls["Rrs"]), isNear({1, 1, 1}));
 }
 
-// (1,0,0) is wide by two, turned to (0,2,0) and moved by (1,2,3); the node itself stands at (0,0,10).
+// (1,0,0) is scaled by two, rotated to (0,2,0) and moved by (1,2,3); the node itself is at (0,0,10).
 TEST(GeometricTransformFixture, MovesThePointsOfTheMesh) {
     TnFbxReadInfo info = worldRead("geometric_transform_7400_ascii.fbx");
     info.setTransformPoints(true);
@@ -162,7 +162,7 @@ class SpotLightOfEachGeneration : public testing::TestWithParam<const char*> {};
 INSTANTIATE_TEST_SUITE_P(Files, SpotLightOfEachGeneration,
                          testing::Values("lights_5800_ascii.fbx", "lights_6100_ascii.fbx"));
 
-// It shines along −Y in files; the post-rotation, which enters inverted, and the turn to −Z cancel each other.
+// It shines along −Y in files; the post-rotation, which enters inverted, and the rotation to −Z cancel each other.
 TEST_P(SpotLightOfEachGeneration, GivesItsValuesAndShinesAlongItsZAxis) {
     FacadeRead<TnFbxLight> lights(worldRead(GetParam()));
     const TnFbxLight& spot = lights["spot"];
@@ -193,7 +193,7 @@ TEST(TemplateFixture, GivesNothingToObjectsOfAnotherClass) {
     EXPECT_EQ(cameras["camera"].getValue(TnFbxCamera::kFbxCameraFocalLength), kFocalLengthOfTheClass);
 }
 
-// ---- Names and contradictions ----
+// ---- Names and inconsistent files ----
 
 TEST(NamesFixture, KeepsWhatAProgramCalledItsNodes) {
     FacadeRead<TnFbxNull> nulls(fixture("names_7400_ascii.fbx"));
@@ -215,7 +215,7 @@ TEST(NamesFixture, FindsNodesByTheirNames) {
 TEST(OddConnectionsFixture, LoadsWithWhatIsSoundInIt) {
     FacadeRead<TnFbxNull> nulls(worldRead("odd_connections_7400_ascii.fbx"));
 
-    // parents before children, each once, whatever else is said of them
+    // parents before children, each once, whatever other connections there are
     EXPECT_THAT(nulls.names(),
                 ElementsAre("first", "negative", "child of negative", "loop A", "loop B", "own child", "twice"));
 }
@@ -235,7 +235,7 @@ TEST(OddConnectionsFixture, PlacesAChildByAParentOfANegativeId) {
 TEST(OddConnectionsFixture, KeepsTheFirstParentOfANode) {
     FacadeRead<TnFbxNull> nulls(worldRead("odd_connections_7400_ascii.fbx"));
 
-    EXPECT_EQ(positionOf(nulls["twice"]), Samples({0, 0, 0})); // below "first" it would stand at (1,0,0)
+    EXPECT_EQ(positionOf(nulls["twice"]), Samples({0, 0, 0})); // below "first" it would be at (1,0,0)
 }
 
 } // namespace

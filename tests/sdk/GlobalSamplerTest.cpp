@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Lists in the world: long clips, deep trees, what a list costs, and the stack that is evaluated.
+// Lists in the world: long clips, deep trees, the cost of a list, and the stack that is evaluated.
 #include "DeformationScenes.h"
 
 #include "TnFbxError.h"
@@ -49,7 +49,7 @@ void expectSameBits(Transform& a, Transform& b) {
 
 TEST(ListsInTheWorld, AnimateTheOneNullThatMovesInALongClip) {
     constexpr int kLast = 20'000;
-    const support::MemoryLimitScope limit((kLast + 1) * sizeof(float)); // of the one channel that moves
+    const support::MemoryLimitScope limit((kLast + 1) * sizeof(float)); // of the one channel that changes
     TestScene scene(0, kLast);
     for (int i = 0; i < 100; ++i) {
         scene.addNode("still");
@@ -90,7 +90,7 @@ TEST(ListsInTheWorld, BakeEveryMeshAtItsFrameHoweverLongTheClip) {
     }
 }
 
-/// A chain that turns and shifts at every level, with a leaf at each, over more frames than one portion.
+/// A chain that rotates and moves at every level, with a leaf at each, over more frames than one portion.
 class DeepScene : public TestScene {
 public:
     DeepScene() : TestScene(-3, 2500) {
@@ -162,7 +162,7 @@ TEST(ListsInTheWorld, FailForWhatMovesBeyondTheLimitAndSayOverWhichFrames) {
 }
 
 TEST(ListsInTheWorld, EvaluateNoMoreThanTheLimitWhereNothingShows) {
-    // A billion frames that move less than a float can tell: what is given back is bounded, too.
+    // A billion frames that change by less than a float can represent: what is returned is bounded, too.
     const support::MemoryLimitScope limit(1 << 16);
     TestScene scene(0, 1'000'000'000);
     fbxsdk::FbxNode* node = scene.addNode("mover");

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Damaged and hostile files through the facade: a false result with a reason, or objects; never more memory than the
-// file is worth.
+// Damaged and hostile files through the facade: a false result with a reason, or objects; memory in proportion to the
+// file's size.
 #include <filesystem>
 #include <fstream>
 #include <memory>
@@ -81,7 +81,7 @@ TEST(HostileFile, GivesObjectsOrAReasonWhereverItIsCutOff) {
 
 TEST(HostileFile, GivesObjectsOrAReasonWhateverByteIsChanged) {
     const support::TemporaryFolder folder;
-    std::mt19937 random(11); // a fixed seed is the point
+    std::mt19937 random(11); // a fixed seed is intended
     for (const auto& path : ownFiles()) {
         const std::string whole = bytesOf(path);
         for (int round = 0; round < 60 && !whole.empty(); ++round) {

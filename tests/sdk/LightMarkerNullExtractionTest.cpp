@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Lights, markers and nulls out of nodes.
+// Reading lights, markers and nulls from nodes.
 #include "support/SceneBuilders.h"
 
 #include "TnFbxError.h"

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Writing lights: colour, intensity, cone, decay and the turn of the node, by type.
+// Writing lights: colour, intensity, cone, decay and the rotation of the node, by type.
 #include "support/WritingBuilders.h"
 
 #include "TnFbxError.h"

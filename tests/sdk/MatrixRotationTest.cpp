@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What `extractMatrixRotation` makes of matrices that scale, mirror or turn far: when the angles are those of the
-// rotation, and when the lengths of the axes get into them. All matrices and angles are worked out by hand.
+// The results of `extractMatrixRotation` for matrices with scale, mirroring or large angles: when the angles are those
+// of the rotation, and when the lengths of the axes falsify them. All matrices and angles are computed by hand.
 #include "FbxSdk.h"
 
 #include <gtest/gtest.h>
@@ -21,7 +21,7 @@ struct Axes {
 
     [[nodiscard]] Axes scaled(double a, double b, double c) const { return {times(x, a), times(y, b), times(z, c)}; }
 
-    /// Without negative zeros, which would turn the sign of a half turn.
+    /// Without negative zeros, which would change the sign of a half turn.
     static Vector times(const Vector& v, double factor) {
         return {v[0] * factor + 0.0, v[1] * factor + 0.0, v[2] * factor + 0.0};
     }
@@ -34,7 +34,7 @@ const Axes kZ37 = {{0.8, 0.6, 0}, {-0.6, 0.8, 0}, {0, 0, 1}};     ///< and about
 const Axes kX143 = {{1, 0, 0}, {0, -0.8, 0.6}, {0, -0.6, -0.8}};  ///< 143.13 degrees about X
 const Axes kX90Z37 = {{0.8, 0, 0.6}, {-0.6, 0, 0.8}, {0, -1, 0}}; ///< Z first, then a right angle about X
 constexpr float kAngle = 36.8698976f;                             ///< the arc sine of 0.6
-constexpr float kTolerance = 2e-5f; ///< degrees; neighbouring floats at 180 are 1.5e-5 apart
+constexpr float kTolerance = 2e-5f;                               ///< degrees; adjacent floats at 180 are 1.5e-5 apart
 
 void expectAngles(const Axes& axes, float x, float y, float z) {
     fbxsdk::FbxAMatrix matrix;
@@ -88,15 +88,15 @@ TEST(ExtractMatrixRotation, LosesTheOtherAnglesAtGimbalLockOfAScaledAxis) {
 TEST(ExtractMatrixRotation, BendsTheAngleAboutZWhereXAndYAreScaledDifferently) {
     expectAngles(kZ37.scaled(2, 1, 1), 0, 0, 56.3099325f); // atan2(1.2, 0.8)
     expectAngles(kZ37.scaled(1, 2, 1), 0, 0, 20.5560452f); // atan2(0.6, 1.6)
-    expectAngles(kX37.scaled(2, 1, 1), kAngle, 0, 0);      // nothing to bend
+    expectAngles(kX37.scaled(2, 1, 1), kAngle, 0, 0);      // nothing to falsify
     expectAngles(kY37.scaled(1, 2, 1), 0, kAngle, 0);      //
-    expectAngles(kZ37.scaled(1, 1, 2), 0, 0, kAngle);      // Z alone bends nothing
+    expectAngles(kZ37.scaled(1, 1, 2), 0, 0, kAngle);      // Z alone falsifies nothing
     expectAngles(kY37.scaled(1, 1, 2), 0, kAngle, 0);      //
     expectAngles(kX37.scaled(1, 1, 2), kAngle, 0, 0);      //
 }
 
 TEST(ExtractMatrixRotation, TakesAMirroredAxisForATurn) {
-    expectAngles(kUnturned.scaled(-1, 1, 1), 0, 0, 0);   // unseen
+    expectAngles(kUnturned.scaled(-1, 1, 1), 0, 0, 0);   // not detected
     expectAngles(kUnturned.scaled(1, -1, 1), 0, 0, 180); // atan2(0, −1)
     expectAngles(kUnturned.scaled(1, 1, -1), 0, 180, 0); // atan2(0, −1)
     expectAngles(kUnturned.scaled(-1, -1, -1), 0, 180, 180);

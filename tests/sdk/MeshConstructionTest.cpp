@@ -33,7 +33,7 @@ Corners cornersOf(const fbxsdk::FbxMesh& mesh) {
     return corners;
 }
 
-/// A mesh whose polygon vertices name the points 0, 1, 2, … with polygons of these sizes.
+/// A mesh whose polygon vertices refer to the points 0, 1, 2, … with polygons of these sizes.
 std::unique_ptr<TnFbxMesh> meshOf(const std::vector<int>& sizes, int corners) {
     auto mesh = std::make_unique<TnFbxMesh>();
     EXPECT_TRUE(mesh->allocateGeometryData(static_cast<int>(sizes.size()), corners, corners));

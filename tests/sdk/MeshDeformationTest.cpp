@@ -141,7 +141,7 @@ TEST(Skin, CountsFromThePlaceOfTheBoneAtBinding) {
 
     const Points points = deformed(scene, node);
 
-    EXPECT_NEAR(points[0][0], 3.0, 1e-12); // (−1, 0) from the bone, turned to (0, −1)
+    EXPECT_NEAR(points[0][0], 3.0, 1e-12); // (−1, 0) from the bone, rotated to (0, −1)
     EXPECT_NEAR(points[0][1], -1.0, 1e-12);
     expectPoint(points[1], 3.0, 0.0, 0.0);
 }
@@ -302,7 +302,7 @@ TEST(Skin, AccumulatesAWeightAtTheThresholdThoughATotalThereDeformsNothing) {
     fbxsdk::FbxNode* node = addPoints(scene, 2);
     fbxsdk::FbxSkin* skin = addSkin(scene, node);
     FbxCluster* cluster = addCluster(scene, skin, {4.0, 0.0, 0.0});
-    cluster->AddControlPointIndex(0, threshold); // the total is the threshold: left alone
+    cluster->AddControlPointIndex(0, threshold); // the total is the threshold: unchanged
     cluster->AddControlPointIndex(1, threshold); // two of them: deformed
     cluster->AddControlPointIndex(1, threshold);
 
@@ -341,7 +341,7 @@ TEST(Skin, SurvivesWeightsThatAreNoNumbers) {
     FbxCluster* cluster = addCluster(scene, addSkin(scene, node), {4.0, 0.0, 0.0});
     cluster->AddControlPointIndex(0, std::numeric_limits<double>::quiet_NaN());
 
-    expectPoint(deformed(scene, node)[0], 0.0, 0.0, 0.0); // a total that is no number is not above the threshold
+    expectPoint(deformed(scene, node)[0], 0.0, 0.0, 0.0); // a total that is NaN is not above the threshold
 }
 
 } // namespace

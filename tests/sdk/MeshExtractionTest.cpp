@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes out of nodes: layout, points and baking.
+// Reading meshes from nodes: layout, points and baking.
 #include "MeshScenes.h"
 
 #include <gmock/gmock.h>
@@ -189,7 +189,7 @@ void expectNear(const Floats& values, const Floats& expected) {
     EXPECT_THAT(values, testing::Pointwise(testing::FloatNear(1e-5f), expected));
 }
 
-/// Turned by its geometric rotation about X, then by its own about Z.
+/// Rotated by its geometric rotation about X, then by its own about Z.
 fbxsdk::FbxNode* addTurnedPolygons(TestScene& scene) {
     fbxsdk::FbxNode* node = addTwoPolygons(scene);
     node->LclRotation.Set({0.0, 0.0, 90.0});

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the layers of a mesh say about polygon corners: normals, texture coordinates, colours and materials.
+// The values of a mesh's layers at polygon corners: normals, texture coordinates, colours and materials.
 #include "MeshScenes.h"
 
 #include <memory>
@@ -28,7 +28,7 @@ void addLambert(TestScene& scene, fbxsdk::FbxNode* node, double red, double tran
     node->AddMaterial(material);
 }
 
-// No call damages an element. What an explicit instantiation names may be private: so its array can be taken away.
+// No call damages an element. An explicit instantiation may name private members: so its array can be removed.
 template <class Value>
 using DirectArray = std::unique_ptr<fbxsdk::FbxLayerElementArrayTemplate<Value>>;
 void removeDirectArray(fbxsdk::FbxLayerElementTemplate<FbxVector4>& element);
@@ -42,7 +42,7 @@ template struct DirectArrayRemoval<FbxVector4, &fbxsdk::FbxLayerElementTemplate<
 template struct DirectArrayRemoval<FbxVector2, &fbxsdk::FbxLayerElementTemplate<FbxVector2>::mDirectArray>;
 template struct DirectArrayRemoval<FbxColor, &fbxsdk::FbxLayerElementTemplate<FbxColor>::mDirectArray>;
 
-/// Reads a mesh that is damaged; what the reader throws.
+/// Reads a damaged mesh; returns what the reader throws.
 std::string messageOfReading(TestScene& scene, fbxsdk::FbxNode* node, TnFbxMesh& mesh) {
     try {
         readInto(scene, node, mesh);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What meshes take is held against the memory limit.
+// The memory of meshes is checked against the memory limit.
 #include "Fbx.h"
 #include "TnFbxError.h"
 #include "TnFbxMesh.h"
@@ -59,7 +59,7 @@ TEST(MeshMemory, WithinTheLimitIsHandedOut) {
 
 // ---- Meshes that are on many nodes ----
 
-/// A fan of triangles on so many nodes, which stand side by side or all in one place; those after the first mirrored or
+/// A fan of triangles on that many nodes, which are side by side or all in one place; those after the first mirrored or
 /// not.
 std::string instances(int count, bool sideBySide, bool mirrored) {
     constexpr int kTriangles = 1000;

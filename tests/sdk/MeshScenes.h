@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes with layers as tests build them, and what is read of them.
+// Meshes with layers as tests build them, and the results of reading them.
 #pragma once
 
 #include "support/SceneBuilders.h"

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The factories of nodes, textures and materials: what a new one looks like before its channels are written.
+// The factories of nodes, textures and materials: the state of a new one before its channels are written.
 #include "support/WritingBuilders.h"
 
 #include "TnFbxError.h"

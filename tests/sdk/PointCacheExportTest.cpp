@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Point caches of animated meshes: where they lie, what refers to them, and which samples are in them.
+// Point caches of animated meshes: their location, the deformers that refer to them, and their samples.
 #include "support/TemporaryFolder.h"
 #include "support/WritingBuilders.h"
 
@@ -43,7 +43,7 @@ TnFbxTime framesFrom(int first, int last, float rate = 24.0f) {
 struct CacheScene : WrittenScene {
     explicit CacheScene(bool isMaya = true, int sets = 3) : maya(isMaya), mesh(movingMesh("ball", sets)) {
         node = sdk.createMesh(manager, mesh.get(), "ball");
-        scene->GetRootNode()->AddChild(node); // a cache is looked for beside the file of its scene
+        scene->GetRootNode()->AddChild(node); // a cache is looked for next to the file of its scene
     }
 
     std::string fbxFile() const { return folder.file("out/shot.fbx"); }
@@ -87,7 +87,7 @@ struct CacheScene : WrittenScene {
     fbxsdk::FbxNode* node;
 };
 
-/// Names of what is in a folder, in order.
+/// The names in a folder, in order.
 std::vector<std::string> filesIn(const std::string& folder) {
     std::vector<std::string> names;
     if (fs::is_directory(folder)) {
@@ -99,7 +99,7 @@ std::vector<std::string> filesIn(const std::string& folder) {
     return names;
 }
 
-/// What is printed meanwhile.
+/// The output to standard output.
 template <class Action>
 std::string printedBy(Action action) {
     testing::internal::CaptureStdout();
@@ -522,7 +522,7 @@ TEST(PointCachesOfAScene, OverwriteEachOtherForMeshesOfOneName) {
 
 TEST(PointCachesOfAScene, StayWhenTheSceneCannotBeSaved) {
     TemporaryFolder folder;
-    fs::create_directories(folder.file("out/shot.fbx")); // a folder in the place of the file
+    fs::create_directories(folder.file("out/shot.fbx")); // a folder with the name of the file
     WrittenScene scene;
     const auto mesh = movingMesh("mesh", 3);
     WrittenObjects objects;

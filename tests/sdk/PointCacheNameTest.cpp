@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Names of nodes as names of files: plain ones as they are, all others in a form that every system can hold.
+// Names of nodes as names of files: plain ones unchanged, all others in a form that every system can hold.
 #include "access/PointCacheName.h"
 
 #include "support/TemporaryFolder.h"
@@ -105,7 +105,7 @@ TEST(PointCacheName, IsCutBetweenCharactersAndEscapes) {
     }
 }
 
-/// Nodes keep their names in the FBX file, whatever their caches are called.
+/// Nodes keep their names in the FBX file, whatever the names of their caches.
 TEST(PointCacheName, LetsMeshesOfAnyNameComeBackWithTheirPoints) {
     for (const bool maya : {true, false}) {
         support::TemporaryFolder folder;

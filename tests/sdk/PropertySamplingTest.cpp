@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Sampling: which frames an animated property is sampled over, and what the samples are.
+// Sampling: which frames an animated property is sampled over, and the samples.
 #include "sdk/SampleRange.h"
 
 #include "TnFbxError.h"
@@ -134,7 +134,7 @@ TEST(PropertySampling, LeavesTheSamplesOfAnObjectAloneWhenThePropertyHasNone) {
     EXPECT_EQ(test::samplesOf(transform, Transform::kFbxTransformPositionX), Samples({7.0f, 8.0f}));
 }
 
-// A layer with a curve node, of which one component has a curve and none a key.
+// A layer with a curve node, one component of which has a curve and none a key.
 TEST(PropertySampling, TakesCurvesWithoutKeysForNone) {
     TestScene scene(0, 10);
     fbxsdk::FbxNode* node = scene.addNode("still");

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a read notices and does not fail for: the caller finds it in `lastWarnings()`, with the file and the object.
+// What a read notices without failing: `lastWarnings()` lists it, with the file and the object.
 #include "FixtureFiles.h"
 #include "support/FacadeReads.h"
 #include "support/SceneBuilders.h"
@@ -107,7 +107,7 @@ TEST(ReadWarnings, NameSurfacesThatAreCountedButNotRead) {
     EXPECT_THAT(lastWarnings(), IsEmpty());
 }
 
-/// Two meshes with the same geometry, whose last corner names the eighth of three points; or there are none.
+/// Two meshes with the same geometry, whose last corner refers to the eighth of three points; or there are none.
 std::string cornersBeyondThePoints(bool hasPoints) {
     const std::string points = hasPoints ? "Vertices: *9 {\na: 1,0,0,2,0,0,3,1,0\n}\n" : "";
     return "; FBX 7.4.0 project file\nFBXHeaderExtension: {\nFBXVersion: 7400\n}\nObjects: {\n"

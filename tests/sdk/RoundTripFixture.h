@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Objects are written into a file of every version, as text and as binary, to be read back.
+// Objects are written into a file of every version, as ASCII and as binary, to be read back.
 #pragma once
 
 #include "support/TemporaryFolder.h"

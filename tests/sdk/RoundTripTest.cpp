@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What is written comes back: every kind of object through a file of every version, as text and as binary.
+// Written objects are read back: every kind of object through a file of every version, as ASCII and as binary.
 #include "RoundTripFixture.h"
 #include "support/FacadeReads.h"
 #include "support/SceneBuilders.h"
@@ -304,7 +304,7 @@ std::unique_ptr<TnFbxMesh> filledMesh() {
 
 using Numbers = std::vector<std::array<float, 4>>;
 
-/// All corners of a mesh: whatever one of its getters gives for each.
+/// All corners of a mesh: the results of one of its getters for each.
 template <class Get>
 Numbers cornersOf(const TnFbxMesh& mesh, Get get) {
     Numbers numbers(static_cast<std::size_t>(mesh.getNumberOfPolygonVertices()));
@@ -464,7 +464,7 @@ TEST_P(RoundTrip, OfObjectsOfOneName) {
     const std::vector<std::string> names = {nulls.objects[0].getName(), nulls.objects[1].getName(),
                                             lights.objects[0].getName(), cameras.objects[7].getName(),
                                             meshes.objects[0].getName()};
-    if (std::get<0>(GetParam()) == TnFbxWriteInfo::kFbxVersion2010) { // its objects are known by their names
+    if (std::get<0>(GetParam()) == TnFbxWriteInfo::kFbxVersion2010) { // its objects are identified by their names
         EXPECT_THAT(names, testing::Each(testing::StartsWith("same")));
         EXPECT_EQ(std::set<std::string>(names.begin(), names.end()).size(), names.size());
     } else {
@@ -511,7 +511,7 @@ TEST_P(RoundTrip, OfPointIndicesThatNameNoPointReadsSoundly) {
 
 TEST_P(RoundTrip, TurnsNullsTransformsAndPointLightsInTheirOwnOrder) {
     constexpr std::array<std::array<int, 3>, 6> kAxes = {
-        {{0, 1, 2}, {0, 2, 1}, {1, 0, 2}, {1, 2, 0}, {2, 0, 1}, {2, 1, 0}}}; // the axes that turn first, second, third
+        {{0, 1, 2}, {0, 2, 1}, {1, 0, 2}, {1, 2, 0}, {2, 0, 1}, {2, 1, 0}}}; // the axes by order of rotation
     constexpr std::array<double, 3> kDegrees = {20.0, -35.0, 50.0};
     for (std::size_t order = 0; order < kAxes.size(); ++order) {
         TnFbxNull null;

@@ -35,7 +35,7 @@ Names namesOf(const std::vector<Object>& objects) {
     return names;
 }
 
-/// A node with an attribute that the platform only knows by its class.
+/// A node with an attribute of a class that the platform does not implement.
 template <class Attribute>
 void addOfEveryKind(TestScene& scene, const char* name) {
     scene.add<Attribute>(name);
@@ -641,7 +641,7 @@ TEST(Walkers, OfCamerasAndMeshesPassTheirOwnFlags) {
 
 TEST(ProducerIntoArray, FillsTheElementAtTheIndexOrTheFirstOneByName) {
     TestScene scene;
-    scene.sdk.getNumberOfCameras(); // makes them
+    scene.sdk.getNumberOfCameras(); // creates them
     fbxsdk::FbxCamera* top = scene.scene->GlobalCameraSettings().GetCameraProducerTop();
     std::vector<TnFbxCamera> cameras(3);
     TnFbxReadInfo all = test::readAll();

@@ -262,7 +262,7 @@ TEST(Loading, ImportsAsItIsAtTheLowLevel) {
 
     EXPECT_EQ(scene->GetGlobalSettings().GetSystemUnit().GetScaleFactor(), 100.0);
     EXPECT_EQ(scene->GetRootNode()->GetChildCount(), 1);
-    EXPECT_EQ(manager->GetIOSettings(), nullptr); // the import settings are attached nowhere
+    EXPECT_EQ(manager->GetIOSettings(), nullptr); // the import settings are not attached to anything
     EXPECT_TRUE(sdk.destroySdkObjects(&manager));
 }
 

@@ -63,7 +63,7 @@ public:
         }
     }
 
-    /// What the library makes of the points.
+    /// The library's result for the points.
     Points deformed() {
         fbxsdk::FbxTime time = test::timeOfFrame(0);
         FbxAMatrix identity;

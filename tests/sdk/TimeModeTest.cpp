@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The rate at which the calling thread counts frames is the host's: every operation leaves it as it was.
+// The frame rate of the calling thread belongs to the host: every operation leaves it unchanged.
 #include "FixtureFiles.h"
 #include "support/FacadeReads.h"
 #include "support/TemporaryFolder.h"

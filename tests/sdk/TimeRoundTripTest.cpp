@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Rates, frames and the span of a shot come back from files of every version, as text and as binary.
+// Rates, frames and the span of a shot are read back from files of every version, as ASCII and as binary.
 #include "RoundTripFixture.h"
 #include "support/FacadeReads.h"
 #include "support/SceneBuilders.h"
@@ -109,9 +109,9 @@ TEST_P(TimeRoundTrip, OfAShotKeepsItsFirstAndLastFrame) {
         {1001, 1048, 1.0f, 1.0f, 1001, 1048},       // no frames are given: those of the keys
         {1001, 1048, 1001.0f, 1048.0f, 1001, 1048}, //
         {1010, 1020, 1001.0f, 1048.9f, 1001, 1048}, // the frames reach further than the keys
-        {990, 1060, 1001.0f, 1048.0f, 990, 1060},   // and the other way round: nothing is cut off
+        {990, 1060, 1001.0f, 1048.0f, 990, 1060},   // and vice versa: nothing is truncated
         {-20, -10, -24.0f, -5.0f, -24, -5},         //
-        {1001, 1048, 1100.0f, 1000.0f, 1001, 1048}, // a range that is none
+        {1001, 1048, 1100.0f, 1000.0f, 1001, 1048}, // an invalid range
     };
     for (const SpanRow& row : rows) {
         TnFbxNull null = keyedBetween(row.firstKey, row.lastKey);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Transforms: local ones as they are keyed, those in the world as they are evaluated, the two ways to decompose a
+// Transforms: local ones as they are keyed, global ones as they are evaluated, the two ways to decompose a
 // rotation, and the rotation orders.
 #include "support/MemoryLimitScope.h"
 #include "support/SceneBuilders.h"
@@ -380,7 +380,7 @@ TEST(GlobalTransform, MultipliesByTheGeometricOffsetOnTheRight) {
 }
 
 TEST(GlobalTransform, DecomposesDifferentlyAtTheOriginAndBesideIt) {
-    // Y, then X in the frame of the turned Y: the two decompositions give other angles for the same rotation.
+    // Y, then X in the frame of the rotated Y: the two decompositions give other angles for the same rotation.
     TestScene scene(0, 0);
     fbxsdk::FbxNode* node = scene.addNode("node");
     node->LclRotation.Set({90.0, 40.0, 0.0});
@@ -565,7 +565,7 @@ TEST(GlobalTransform, FailsWhereWhatMovesWouldTakeMoreThanTheLimit) {
     const support::MemoryLimitScope limit(100 * 4 * 2); // two channels over a hundred frames
     TestScene scene(0, 0);
     fbxsdk::FbxNode* node = scene.addNode("node");
-    scene.key(node->LclTranslation, "X", {{0, 1.0f}, {99, 99.0f}}); // not from the origin, where angles have a sign
+    scene.key(node->LclTranslation, "X", {{0, 1.0f}, {99, 99.0f}}); // away from the origin, where angles have a sign
     scene.key(node->LclTranslation, "Y", {{0, 1.0f}, {99, 99.0f}});
     EXPECT_TRUE(readTransform(scene, node, true, timeRecord(0, 99)).getTransformAnimated(kPositionX));
 

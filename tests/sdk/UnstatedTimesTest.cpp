@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files that leave out the span of a stack or the rate of their time mode: both come from the keys.
+// Files that omit the span of a stack or the rate of their time mode: both are derived from the keys.
 #include "FixtureFiles.h"
 #include "support/FacadeReads.h"
 #include "support/SceneBuilders.h"
@@ -89,7 +89,7 @@ TEST(StackWithoutSpan, HasThatOfTheSceneWithoutAnyOtherTime) {
 TEST(StackWithoutSpan, LeavesAStatedOneAlone) {
     const support::TemporaryFolder folder;
     const std::string text = textOf("custom_rate_7400_ascii.fbx");
-    // a writer leaves out what is the default
+    // a writer omits what is the default
     expectTime(stackTime(folder.write("a.fbx", changed(text, kSpan[0], ""))), 0, 5, 12.5f);
 }
 
@@ -104,7 +104,7 @@ TEST(TakeWithoutSpan, HasTheSpanOfItsKeys) {
 
 // ---- Rates of custom time modes ----
 
-/// What a write at that rate makes: a custom time mode without a rate, and a key for each frame.
+/// The result of a write at that rate: a custom time mode without a rate, and a key for each frame.
 TnFbxTime writtenAndRead(float rate, int first, int last, TnFbxWriteInfo::eCompatibilityVersion version) {
     const support::TemporaryFolder folder;
     TnFbxNull null;
@@ -193,7 +193,7 @@ TEST(TextOfAnotherSystem, IsRefusedWithDecimalCommas) {
     EXPECT_EQ(lastError(), file + ": line 14: the property \"CustomFrameRate\" has more numbers than its type holds");
 }
 
-// Wherever a text ends, it gives its node or a reason.
+// Wherever an ASCII file ends, reading it gives its node or a reason.
 TEST(TextThatIsCutOff, IsNeverAnEmptyScene) {
     const support::TemporaryFolder folder;
     const std::string text = textOf("custom_rate_7400_ascii.fbx");

@@ -16,7 +16,7 @@ using namespace test;
 
 using fbxsdk::FbxCache;
 
-/// A mesh of two points with a cache file beside it that moves them along Z by the frame number.
+/// A mesh of two points with a cache file next to it that moves them along Z by the frame number.
 struct CacheScene : TestScene {
     explicit CacheScene(FbxCache::EFileFormat format, bool active = true) : TestScene(0, 10) {
         scene->GetGlobalSettings().SetTimeMode(fbxsdk::FbxTime::eFrames24);

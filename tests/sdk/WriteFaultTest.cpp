@@ -1,10 +1,10 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Writing whole scenes while something gives out: memory, the medium, the folder. What stood there before stays, and
+// Writing whole scenes while a resource fails: memory, the medium, the folder. The previous files stay, and
 // nothing else is left behind.
 //
-// The allocation functions of this executable are replaced by ones that count and that fail when they are told to.
+// The allocation functions of this executable are replaced by ones that count and that fail on request.
 #include "support/AsNobody.h"
 #include "support/TemporaryFolder.h"
 #include "support/WritingBuilders.h"
@@ -38,9 +38,9 @@ constexpr long kNever = std::numeric_limits<long>::max();
 
 std::atomic<long> gAllocations{0};          ///< since the counters were set
 std::atomic<long> gFirstFailing{kNever};    ///< the number of the first allocation that fails
-std::atomic<long> gFirstWorkingAgain{0};    ///< the number of the first behind those that fail
+std::atomic<long> gFirstWorkingAgain{0};    ///< the number of the first after those that fail
 std::atomic<long> gLive{0};                 ///< allocations that are not freed
-std::atomic<bool> gHasQuietlyFailed{false}; ///< without an exception, which some algorithms make up for
+std::atomic<bool> gHasQuietlyFailed{false}; ///< without an exception, which some algorithms handle
 
 void* allocate(std::size_t size) noexcept {
     const long number = gAllocations++;
@@ -152,7 +152,7 @@ struct Layout {
 
 class WriteFault : public testing::TestWithParam<Layout> {
 protected:
-    // The time stands in files, in ASCII with as many digits as it has: without it all files are of one size.
+    // Files contain the time, in ASCII with a variable number of digits: without it all files are of one size.
     WriteFault() {
         ::setenv("SOURCE_DATE_EPOCH", "1585690463", 1);
         setFileName(file);
@@ -195,7 +195,7 @@ protected:
             folder.write("shot_fpc/" + name, "old " + name);
         }
     }
-    /// What a write leaves that nothing stands in the way of.
+    /// The files of a write without faults.
     void writeReference() {
         writeOldFiles();
         oldCache = cacheContents();
@@ -205,7 +205,7 @@ protected:
         ASSERT_NE(oldCache, completeCache);
         writeOldFiles();
     }
-    /// Scene and cache are as they were.
+    /// Scene and cache are unchanged.
     void expectOldFiles() const {
         EXPECT_EQ(folder.read("shot.fbx"), "old");
         expectNothingElse();
@@ -241,7 +241,7 @@ INSTANTIATE_TEST_SUITE_P(Layouts, WriteFault,
 
 enum class Outcome { eWritten, eRefused, eThrown };
 
-/// Lets allocations fail from one on, as many as that.
+/// Makes allocations fail from one on, that many.
 template <class Action>
 Outcome outcomeWithoutMemory(long first, long count, const Action& action) {
     gHasQuietlyFailed = false;
@@ -257,7 +257,7 @@ Outcome outcomeWithoutMemory(long first, long count, const Action& action) {
     return outcome;
 }
 
-/// Allocations that are not freed, but for what the host may ask about the last call.
+/// Allocations that are not freed, except for the data of the last call.
 long liveAllocations() {
     const auto allocates = [](const std::string& text) { return text.capacity() > std::string().capacity(); };
     const std::vector<std::string>& warnings = lastWarnings();
@@ -320,7 +320,7 @@ TEST_P(WriteFault, InAnyAllocationLeavesTheOldFileAndNothingElse) {
             }
             expectOldFiles();
             if (HasFailure()) {
-                return; // the others would say the same hundreds of times
+                return; // the others would repeat the same hundreds of times
             }
         }
     }
@@ -328,7 +328,7 @@ TEST_P(WriteFault, InAnyAllocationLeavesTheOldFileAndNothingElse) {
 
 // ---- The medium ----
 
-/// What a write in another process came to.
+/// The result of a write in another process.
 struct Report {
     bool written = false;
     std::string error; ///< and a line for each warning
@@ -345,7 +345,7 @@ Report writtenWithin(rlim_t bytes, const Action& action) {
         const rlimit limit{bytes, bytes};
         ::setrlimit(RLIMIT_FSIZE, &limit);
         const int nowhere = ::open("/dev/null", O_WRONLY | O_CLOEXEC);
-        ::dup2(nowhere, STDOUT_FILENO); // a cache that cannot be opened is told of there
+        ::dup2(nowhere, STDOUT_FILENO); // a cache that cannot be opened is reported there
         const bool written = action();
         std::string text = (written ? "1" : "0") + lastError();
         for (const std::string& warning : lastWarnings()) {
@@ -366,7 +366,7 @@ Report writtenWithin(rlim_t bytes, const Action& action) {
     return {!text.empty() && text[0] == '1', text.empty() ? "" : text.substr(1)};
 }
 
-/// How many allocations something takes.
+/// The number of allocations of a call.
 template <class Action>
 long allocationsOf(const Action& action) {
     const long before = gAllocations;
@@ -454,7 +454,7 @@ TEST_P(WriteFault, OfADeviceThatIsFullIsSaid) {
 
 TEST_P(WriteFault, OfAPipeThatBreaksIsSaid) {
     ASSERT_EQ(::mkfifo(file.c_str(), 0600), 0);
-    test::WrittenObjects many = objects; // more than a pipe takes without a reader
+    test::WrittenObjects many = objects; // more than a pipe holds without a reader
     many.meshes.insert(many.meshes.end(), 100, objects.meshes[0]);
     objects = many;
     std::thread reader([this] {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What is written as it was handed over, and what a host is told of it.
+// Data that is written as passed, and the warnings about it.
 #include "support/FacadeReads.h"
 #include "support/TemporaryFolder.h"
 #include "support/WritingBuilders.h"
@@ -31,7 +31,7 @@ protected:
         info = test::writeInfo();
         info.setFileName(folder.file("shot.fbx"));
     }
-    /// Writes, which succeeds, and hands out what the host is told.
+    /// Writes, which succeeds, and returns the warnings.
     std::vector<std::string> warnings() const {
         EXPECT_TRUE(
             Fbx().writeFile(info, objects.cameras, objects.lights, objects.transforms, objects.nulls, objects.meshes))

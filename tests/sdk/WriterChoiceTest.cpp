@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The choice among more writers than the platform brings along.
+// The choice among more writers than the platform has.
 #include "access/WriterChoice.h"
 
 #include <gtest/gtest.h>
@@ -17,7 +17,7 @@ struct Writer {
     bool isFbx;
 };
 
-/// Answers as the platform's registry does.
+/// Implements the platform's registry.
 class Registry {
 public:
     Registry(std::vector<Writer> writers, int native) : mWriters(std::move(writers)), mNative(native) {}

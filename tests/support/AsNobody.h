@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Permissions that hold for a superuser too.
+// Permissions that apply to a superuser too.
 #pragma once
 
 #include <unistd.h>
@@ -10,7 +10,7 @@
 
 namespace support {
 
-/// Runs as nobody, who owns nothing, for what a superuser would be allowed to do.
+/// Runs as the user "nobody", who owns nothing, for operations that a superuser would be allowed to do.
 class AsNobody {
 public:
     AsNobody() { mChanged = ::geteuid() == 0 && ::seteuid(kNobody) == 0; }

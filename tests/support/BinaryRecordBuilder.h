@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Hand-built binary files for tests: every version, both byte orders, and, where a test wants it, wrong on purpose.
+// Hand-built binary files for tests: every version, both byte orders, and, where a test needs it, deliberately invalid.
 //
 //     BinaryRecordBuilder file(7400);
 //     file.begin("Objects").block();
@@ -57,7 +57,7 @@ public:
         mOpen.pop_back();
         return *this;
     }
-    /// The current record will say that it ends at 0, as some writers' leaf records do.
+    /// The current record will state an end of 0, as some writers' leaf records do.
     BinaryRecordBuilder& loseEnd() {
         mOpen.back().endLost = true;
         return *this;
@@ -83,14 +83,14 @@ public:
     BinaryRecordBuilder& compressedArray(char code, const std::vector<Number>& numbers) {
         return arrayOf(code, numbers.size(), 1, deflated(encode(numbers)));
     }
-    /// An array whose head says whatever a test wants it to say.
+    /// An array with arbitrary fields in its head.
     BinaryRecordBuilder& arrayOf(char code, std::size_t count, std::uint32_t encoding, std::string_view payload) {
         value(code).number(static_cast<std::uint32_t>(count));
         number(encoding).number(static_cast<std::uint32_t>(payload.size()));
         return bytes(payload);
     }
 
-    /// Anything at all, as part of the current record's values (or between records).
+    /// Arbitrary bytes, as part of the current record's values (or between records).
     BinaryRecordBuilder& bytes(std::string_view anything) {
         mBytes += anything;
         return *this;
@@ -110,7 +110,7 @@ public:
         nullRecord();
         return mBytes + std::string(160, '\0');
     }
-    /// What there is so far.
+    /// The bytes so far.
     [[nodiscard]] std::string& soFar() { return mBytes; }
 
     template <class Number>

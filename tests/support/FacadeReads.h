@@ -43,7 +43,7 @@ struct FacadeReader<TnFbxMesh> {
     static constexpr auto kRead = &Fbx::getMeshes;
 };
 
-/// Local transforms, points as they are.
+/// Local transforms, points unchanged.
 inline TnFbxReadInfo localRead(const std::string& fileName) {
     TnFbxReadInfo info;
     info.setFileName(fileName);

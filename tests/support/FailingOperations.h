@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Faults in the single operations that a file is written with.
+// Faults in the single operations of writing a file.
 #pragma once
 
 #include <cerrno>
@@ -13,7 +13,7 @@
 
 namespace support {
 
-/// Fails at the operation whose turn it is.
+/// Fails at the operation of that number.
 class FailingOperations final : public fbxsdk::detail::FileOperations {
 public:
     explicit FailingOperations(int failAt) : mFailAt(failAt) {}

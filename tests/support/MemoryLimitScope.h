@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Another memory limit for as long as a test needs it.
+// Sets the memory limit for a scope.
 #pragma once
 
 #include "TnFbxLimits.h"

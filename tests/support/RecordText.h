@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A record tree as one line of text, so that a test can say all of what it expects at once:
+// A record tree as one line of text, so that a test can state all of its expectation at once:
 //
 //     Objects: 17, "Cube", 'T', [1 2 3] { Child: { } }
 #pragma once
@@ -80,7 +80,7 @@ private:
     return result;
 }
 
-/// The records of a file's bytes, or the sentence that says why there are none.
+/// The records of a file's bytes, or the reason why there are none.
 [[nodiscard]] inline std::string readText(std::string_view bytes) {
     const ExactBytes exact(bytes);
     fbxsdk::FbxStatus status;

@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Scenes built in memory through the platform's API, for the tests of the adapter: a context with an empty scene, and
-// short ways to nodes, attributes, keys and meshes.
+// helpers for nodes, attributes, keys and meshes.
 #pragma once
 
 #include "FbxSdk.h"
@@ -93,7 +93,7 @@ public:
     fbxsdk::FbxAnimLayer* layer = nullptr;
 };
 
-/// Options for a read by the context itself, which asks for neither file nor stack name.
+/// Options for a read by the context itself, which requires neither file nor stack name.
 inline TnFbxReadInfo readAll(bool global = false) {
     TnFbxReadInfo info;
     info.setGlobalTransform(global);

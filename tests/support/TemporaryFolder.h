@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A folder of its own for a test that needs files, gone when the test ends.
+// A temporary folder for a test, removed at its end.
 #pragma once
 
 #include <algorithm>

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Value objects to write and what the tests of the writing half look at: a context with an empty scene, keyed channels,
-// small meshes, and the curves and nodes that came out of them.
+// Value objects to write and accessors for the results: a context with an empty scene, keyed channels,
+// small meshes, and the resulting curves and nodes.
 #pragma once
 
 #include "FbxSdk.h"
@@ -17,7 +17,7 @@
 
 namespace Tarnell::Fbx::test {
 
-/// The lists that a scene is made of; the objects stay the test's.
+/// The lists of a scene's objects; the test owns the objects.
 struct WrittenObjects {
     std::vector<TnFbxCamera*> cameras;
     std::vector<TnFbxLight*> lights;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Reads and writes of hosts that do several at once, each with objects of its own.
+// Concurrent reads and writes of hosts, each with objects of its own.
 #include "support/FacadeReads.h"
 #include "support/SceneBuilders.h"
 #include "support/TemporaryFolder.h"
@@ -64,7 +64,7 @@ TEST(FacadeThreads, WriteFilesOfTheirOwnAtTheSameTime) {
         TnFbxWriteInfo info;
         info.setFileName(folder.file(name + ".fbx"));
         info.setAnimationStackName("walk");
-        info.setFPS(thread == 0 ? 24.0f : 60.0f); // rates are set for a thread
+        info.setFPS(thread == 0 ? 24.0f : 60.0f); // rates are set per thread
         info.setStartFrame(1);
         info.setEndFrame(2);
         for (int round = 0; round < kRounds; ++round) {
@@ -79,7 +79,7 @@ TEST(FacadeThreads, WriteFilesOfTheirOwnAtTheSameTime) {
     }
 }
 
-/// Squares in a row, enough of them that their arrays are written at the same time.
+/// Squares in a row, enough of them for their arrays to be written concurrently.
 void fillStrip(TnFbxMesh& mesh, int squares) {
     ASSERT_TRUE(mesh.allocateGeometryData(squares, 2 * squares + 2, 4 * squares));
     for (int i = 0; i < mesh.getNumberOfControlPoints(); ++i) {

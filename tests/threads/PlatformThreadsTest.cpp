@@ -25,7 +25,7 @@ constexpr int kThreads = 4;
 constexpr int kRounds = 20;
 constexpr int kNodes = 200;
 
-/// What a thread found; compared on the main thread.
+/// The results of a thread; compared on the main thread.
 struct Findings {
     double sum = 0;
     int nodes = 0;

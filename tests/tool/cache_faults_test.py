@@ -1,7 +1,7 @@
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
 #
-# What `cache` says of caches that are damaged: every fault with its place, and all that is sound beside it.
+# The output of `cache` for damaged caches: every fault with its place, and all valid data as well.
 import json
 import os
 import shutil
@@ -64,7 +64,7 @@ class Faults(unittest.TestCase):
         nan = struct.pack("<f", float("nan"))
         self.edit("max.pc2", lambda data: data[:76] + nan + data[80:])
         self.assertEqual(self.faults("max.pc2"), [("max.pc2", 76, "a number that is not finite")])
-        self.assertEqual(self.content("max.pc2", status=0)["faults"], [])  # nobody asked for the numbers
+        self.assertEqual(self.content("max.pc2", status=0)["faults"], [])  # without --verify numbers are not checked
         infinite = struct.pack(">f", float("inf"))
         self.edit("wide.mcx", lambda data: data[:352] + infinite + data[356:])
         self.assertEqual(self.faults("wide.xml"), [("wide.mcx", 352, "channel wave: a number that is not finite")])

@@ -1,7 +1,7 @@
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
 #
-# What camera says follows from the numbers in the file by arithmetic that stands here once more: lens and angle, film
+# The output of camera follows from the numbers in the file by arithmetic that is repeated here: lens and angle, film
 # and picture, rotations and directions.
 import csv
 import io

@@ -1,8 +1,8 @@
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
 #
-# Files that are small and ask for much, made by the generator beside the corpus: loading one takes less than 64 MiB and
-# 1,100 times its size, and so does converting one, but for what a conversion hands out. Without the generator nothing is
+# Small files that demand much, made by the generator next to the corpus: loading one takes less than 64 MiB and
+# 1,100 times its size, and so does converting one, except for a conversion's results. Without the generator nothing is
 # tested, and the status is 77.
 import os
 import subprocess

@@ -126,7 +126,7 @@ class Trees(Folder):
         found = self.only(self.diff(scenes.scene(), scenes.scene(names=("cam", "triangle"))), "renamed", "tri", "mesh")
         self.assertEqual((found["a"], found["b"]), ("tri", "triangle"))
         base = scenes.with_nulls((30, "left", None), (31, "right", None))
-        other = scenes.with_nulls((30, "leftHand", None), (31, "rightHand", None))  # told apart by their numbers
+        other = scenes.with_nulls((30, "leftHand", None), (31, "rightHand", None))  # distinguished by their numbers
         self.assertEqual([(each["kind"], each["a"], each["b"]) for each in self.diff(base, other)],
                          [("renamed", "left", "leftHand"), ("renamed", "right", "rightHand")])
 

@@ -2,7 +2,7 @@
 # Copyright (c) Tarnell FBX contributors
 #
 # The document that dump prints: every key in its place, every word and every number, for the small hand-written files.
-# Other programs check what the library reads by it. What is expected here follows from what stands in the files; the
+# Other programs check by it what the library reads. What is expected here follows from the content of the files; the
 # functions below say what that is.
 import json
 import math
@@ -266,7 +266,7 @@ class Numbers(Document):
 
 class Absences(Document):
     def test_of_a_layers_data_are_null(self):
-        # Without vertex colours materials are asked for them, but not one that the whole mesh shares.
+        # Without vertex colours those of materials are read, but not of one for the whole mesh.
         for key, element in (("normals", "Normal"), ("uvs", "UV"), ("colours", "Color")):
             with self.subTest(key):
                 file = self.edited("mesh_7400_ascii.fbx", (f"LayerElement{element}: 0 {{", "SomethingElse: 0 {"))

@@ -2,7 +2,7 @@
 # Copyright (c) Tarnell FBX contributors
 #
 # Every rule of lint has a file of tests/data/lint that is about it and trips it, and clean.fbx, which trips none; every
-# rule stands in docs/lint.md with the same words.
+# rule is in docs/lint.md with the same words.
 import glob
 import json
 import os

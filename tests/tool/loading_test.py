@@ -2,7 +2,7 @@
 # Copyright (c) Tarnell FBX contributors
 #
 # How much memory loading a file takes: never more than 64 MiB and 1,100 times the size of the file, whatever the file
-# asks for. Objects of a kind that the file has none of are read, so that nothing is handed out.
+# demands. Objects of a kind that the file does not have are read, so that nothing is returned.
 import os
 import sys
 import tempfile

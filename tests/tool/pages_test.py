@@ -1,9 +1,9 @@
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
 #
-# Whole pages of the commands that look into files, as they are printed where nobody sees colours. Each file of
+# Whole pages of the commands that inspect files, as they are printed without colours. Each file of
 # tests/data/tool/pages is a transcript: a command behind "$ ", then what it prints on standard output, then behind "! "
-# what on standard error, then its exit status where that is not 0. With --update the transcripts are written anew; read
+# what on standard error, then its exit status where that is not 0. With --update the transcripts are rewritten; read
 # the difference before you keep it.
 import glob
 import os

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Makes one page of src/, with scripts and styles inside, and writes it as a C++ source in two parts: what stands before
-// the data of files, and what stands behind them.
+// Makes one page of src/, with scripts and styles inside, and writes it as a C++ source in two parts: the text before
+// the data of files, and the text after it.
 //   node build.mjs OUTPUT.cpp
 import { createHash } from "node:crypto";
 import { readFileSync, writeFileSync } from "node:fs";
@@ -39,7 +39,7 @@ function literals(text) {
   return pieces.map((piece) => `    R"page(${piece})page"sv,`).join("\n");
 }
 
-/** The licences of what the page has inside, as their terms ask for. */
+/** The licences of the bundled packages, as their terms require. */
 function licences() {
   return ["three", "uplot"]
     .map((name) => `${name}\n\n${readFileSync(new URL(`node_modules/${name}/LICENSE`, import.meta.url), "utf8")}`)

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx cache: what point caches hold and what is wrong with them; those of an FBX file, or files of caches.
+// tarnell-fbx cache: the content of point caches and their defects; those of an FBX file, or files of caches.
 #include <algorithm>
 #include <cctype>
 #include <filesystem>
@@ -106,7 +106,7 @@ std::vector<CacheEntry> entriesOfScene(const std::string& file, bool verify) {
     return entries;
 }
 
-/// What the samples of one channel have in common.
+/// The common properties of a channel's samples.
 struct ChannelSamples {
     std::uint64_t samples = 0, leastPoints = UINT64_MAX, mostPoints = 0;
     double first = 0.0, last = 0.0;
@@ -129,7 +129,7 @@ std::map<std::string, ChannelSamples> samplesByChannel(const CacheFacts& facts) 
 
 bool isMax(const CacheFacts& facts) { return facts.format == FbxCache::eMaxPointCacheV2; }
 
-// ---- For people ----
+// ---- Text ----
 
 std::string kindText(const CacheFacts& facts) {
     if (isMax(facts))
@@ -223,7 +223,7 @@ void printEntry(const CacheEntry& entry, const CacheOptions& options, std::ostre
         out << "  Verified: all samples are there, and every number is finite\n";
 }
 
-// ---- For programs ----
+// ---- JSON ----
 
 void printUse(const std::optional<MeshUse>& use, JsonWriter& json) {
     json.key("use");

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The same steps as in reading meshes: open the file, find the channel, read the points of each frame. The first one
-// that fails says why.
+// The same steps as in reading meshes: open the file, find the channel, read the points of each frame. The first
+// failing step gives the reason.
 #include "CacheCheck.h"
 
 #include <algorithm>
@@ -13,10 +13,10 @@
 namespace tool {
 namespace {
 
-/// What is said of a cache comes at once, also of a very long one.
+/// The check takes little time, also for a very long cache.
 constexpr std::int64_t kMostSamplesRead = 1000;
 
-/// Open while it lives.
+/// Open for the lifetime of the object.
 class OpenCache {
 public:
     explicit OpenCache(FbxCache& cache) : mCache(cache), mIsOpen(cache.OpenFileForRead(&mStatus)) {}
@@ -81,7 +81,7 @@ std::string maxFault(FbxCache& cache, unsigned int pointCount) {
     if (cache.GetPointCount() != pointCount)
         return "it has " + std::to_string(cache.GetPointCount()) + " points, the mesh has " +
                std::to_string(pointCount);
-    // Frames before zero cannot be asked for.
+    // Frames before zero cannot be requested.
     constexpr double kLargestFrame = INT32_MAX;
     const auto first =
         static_cast<std::int64_t>(std::clamp(std::ceil(cache.GetFrameStartOffset()), 0.0, kLargestFrame));

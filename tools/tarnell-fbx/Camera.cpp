@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx camera: what the cameras of a file say, for people, as a table of frames, and as a document.
+// tarnell-fbx camera: the cameras of a file, as text, as a table of frames, and as JSON.
 #include <cmath>
 #include <iostream>
 
@@ -24,8 +24,8 @@ struct Range {
     long long first, last;
 };
 
-/// The frames that were asked for, or those of the take. Throws Unreadable where the take has not all of them, or where
-/// too many are to be printed.
+/// The requested frames, or those of the take. Throws Unreadable where the take does not have all of them, or where
+/// there are too many to print.
 Range rangeOf(const CameraList& list, const CameraOptions& options) {
     Range range{list.take.firstFrame, list.take.lastFrame};
     if (options.frames) {
@@ -55,7 +55,7 @@ void keepNamed(CameraList& list, const std::string& name) {
         throw Unreadable("it has no camera " + inQuotes(name) + "; its cameras: " + (known.empty() ? "none" : known));
 }
 
-// ---- For people ----
+// ---- Text ----
 
 std::string degrees(double x, double y) { return inDecimals(x, 3) + "° × " + inDecimals(y, 3) + "°"; }
 
@@ -226,9 +226,9 @@ void printText(const CameraList& list, const CameraOptions& options, const Range
         out << "\n" << page.terminal().paint(Ink::warning, "Noticed: " + terminalText(warning)) << '\n';
 }
 
-// ---- For programs ----
+// ---- JSON ----
 
-/// Values are floats of the library: their digits are those of floats.
+/// Values are floats of the library, printed with the digits of floats.
 void number(JsonWriter& json, std::string_view key, double value) {
     json.key(key);
     json.real(static_cast<float>(value));

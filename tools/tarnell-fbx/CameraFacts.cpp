@@ -66,7 +66,7 @@ LensDriver driverOf(const FbxCamera& camera) {
     return LensDriver::focalLength;
 }
 
-/// Width by height of the picture's pixels as they are seen; 0 where the file has no resolution. In the modes with a
+/// Width by height of the picture's pixels as displayed; 0 where the file has no resolution. In the modes with a
 /// ratio one of the two numbers is relative to the other.
 double pictureAspect(const FbxCamera& camera) {
     const double width = camera.AspectWidth.Get(), height = camera.AspectHeight.Get();
@@ -167,8 +167,8 @@ private:
             facts.movedBy = above->GetName();
     }
 
-    /// The node or the nearest one above it whose place is keyed. What is known of those on the way stays known: trees
-    /// may be as deep as they like.
+    /// The node or its nearest ancestor with keys for its transform. Results for the nodes in between are cached: trees
+    /// may have any depth.
     const FbxNode* keyedFrom(FbxNode* node) const {
         std::vector<const FbxNode*> way;
         const FbxNode* keyed = nullptr;

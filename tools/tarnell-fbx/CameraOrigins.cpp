@@ -35,7 +35,7 @@ bool drivesLens(const CameraFacts& facts, const FbxProperty& property) {
 
 bool isZero(const Vector3& vector) { return vector == Vector3{}; }
 
-/// Turns about X, then Y, then Z, as pre- and post-rotations do.
+/// Rotates about X, then Y, then Z, as pre- and post-rotations do.
 FbxAMatrix turnOf(const Vector3& angles) {
     FbxAMatrix turn;
     turn.SetR(FbxVector4(angles[0], angles[1], angles[2]));
@@ -46,7 +46,7 @@ std::string withUnit(const FbxProperty& property, const char* unit) {
     return std::string(property.GetName().Buffer()) + ' ' + valueText(property) + unit;
 }
 
-// ---- What has no say ----
+// ---- Values without effect ----
 
 class IdleList {
 public:
@@ -128,7 +128,7 @@ private:
     std::vector<IdleValue> mValues;
 };
 
-// ---- Where numbers come from ----
+// ---- The origin of numbers ----
 
 class OriginList {
 public:
@@ -174,7 +174,7 @@ private:
         }
     }
 
-    /// Where there are keys the property itself says little.
+    /// Where there are keys the property itself is of little interest.
     std::string stated(const FbxProperty& property, const char* unit) const {
         const std::string name = property.GetHierarchicalName().Buffer();
         const bool keyed = std::any_of(mFacts.channels.begin(), mFacts.channels.end(), [&](const CameraChannel& each) {
@@ -333,7 +333,7 @@ std::string inDecimals(double number, int decimals) {
 std::string rounded(double number, int decimals) {
     const double power = std::pow(10.0, decimals);
     const double near = std::round(number * power) / power;
-    // + 0.0: no minus before a zero.
+    // + 0.0: avoids negative zero.
     return withMinus(numberText(std::isfinite(near) ? near + 0.0 : number));
 }
 

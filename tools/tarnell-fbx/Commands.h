@@ -16,7 +16,7 @@ enum ExitStatus {
     kSuccess = 0,
     kUnreadable = 1, ///< something could not be read or written
     kWrongUsage = 2,
-    kLosses = 3 ///< done, and with --strict: not everything came over
+    kLosses = 3 ///< done, but with --strict something was lost
 };
 
 struct DumpOptions {
@@ -48,12 +48,12 @@ struct ConvertOptions {
     PointCache cache = PointCache::maya;
     bool local = false;
     bool force = false;
-    bool strict = false; ///< what does not come over makes the status kLosses
+    bool strict = false; ///< losses make the status kLosses
 };
 
 enum class Form { text, json, jsonLines, csv, plot, html };
 
-/// What the commands that look into files have in common.
+/// The common options of the commands that inspect files.
 struct LookOptions {
     std::vector<std::string> files; ///< names and patterns
     Form form = Form::text;
@@ -67,7 +67,7 @@ struct TreeOptions : LookOptions {
 struct PropsOptions : LookOptions {
     std::string object;
     std::string take;
-    bool all = false; ///< those that the file leaves at their defaults, too
+    bool all = false; ///< also those with their default values
 };
 
 struct CurveOptions : LookOptions {
@@ -96,7 +96,7 @@ struct CameraOptions : LookOptions {
 
 struct LintOptions : LookOptions {
     std::vector<std::string> rules; ///< ids; empty: all
-    bool list = false;              ///< of the rules, and no file
+    bool list = false;              ///< lists the rules, and reads no file
 };
 
 /// Two files instead of any number.
@@ -107,7 +107,7 @@ struct DiffOptions : LookOptions {
     std::optional<std::pair<int, int>> frames; ///< at which the points of meshes are compared
 };
 
-/// The names of the kinds that dump knows, in the order in which it prints them.
+/// The names of the kinds of `dump`, in the order in which it prints them.
 const std::vector<std::string>& dumpKinds();
 
 int dump(const DumpOptions& options);
@@ -127,12 +127,12 @@ struct ReportOptions {
     std::string output;             ///< "-": standard output
     std::string take;
     std::optional<std::pair<int, int>> frames; ///< only these
-    bool force = false;                        ///< also over what is no report
+    bool force = false;                        ///< also over files that are no report
 };
 
 int report(const ReportOptions& options); ///< not in builds without npm
 
-/// The text as it is shown to people: without anything that a terminal would obey.
+/// The text for display: without control characters for terminals.
 std::string spoken(const std::string& text);
 
 /// One line on standard error, as every failure of the tool prints it.
@@ -140,12 +140,12 @@ void printError(const std::string& file, const std::string& reason);
 
 struct Outcome {
     int status = kSuccess;
-    std::string reason; ///< why work ended before its time; empty when it did not
+    std::string reason; ///< why work ended early; empty when it did not
 };
-/// Runs work. What it throws is a failure like any other, with the status kUnreadable; OutputFailure goes through.
+/// Runs work. What it throws is a failure like any other, with the status kUnreadable; OutputFailure is passed on.
 Outcome attempt(const std::function<int()>& work);
 
-/// Runs work on a file, and hands out its exit status. Why it failed is printed.
+/// Runs work on a file, and returns its exit status. The reason of a failure is printed.
 int guarded(const std::string& file, const std::function<int()>& work);
 
 } // namespace tool

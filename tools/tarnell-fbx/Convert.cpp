@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx convert: what a file shows, read faithfully, and written faithfully into another.
+// tarnell-fbx convert: what a file shows, read faithfully and written faithfully to another file.
 #include <algorithm>
 #include <cmath>
 #include <filesystem>
@@ -35,7 +35,7 @@ constexpr const char* kStandardOutput = "standard output";
 template <class Object>
 struct Objects {
     std::vector<std::unique_ptr<Object>> owned;
-    std::vector<Object*> pointers; ///< as the facade wants them
+    std::vector<Object*> pointers; ///< as the facade takes them
 
     Object& add() {
         owned.push_back(std::make_unique<Object>());
@@ -75,7 +75,7 @@ public:
         const FbxAnimStack* stack = mReader.getScene()->GetCurrentAnimationStack();
         TnFbxWriteInfo info;
         info.setFidelity(kFbxFidelityFaithful);
-        info.setComputeCameraRotation(false); // the rotations that were read say where cameras look
+        info.setComputeCameraRotation(false); // the rotations that were read determine the cameras' directions
         info.setFileName(file);
         info.setAnimationStackName(stack ? stack->GetName() : "");
         info.setFileFormat(mOptions.ascii);
@@ -90,9 +90,9 @@ public:
         return written;
     }
 
-    /// What is in the file that was read, and not in the one that is written.
+    /// The losses: what is in the file that was read, and not in the one that is written.
     [[nodiscard]] const std::vector<std::string>& losses() const { return mLosses.sentences(); }
-    /// What the library noticed.
+    /// The library's warnings.
     [[nodiscard]] const std::vector<std::string>& warnings() const { return mWarnings; }
 
 private:
@@ -103,7 +103,7 @@ private:
         return mOptions.frames ? mOptions.frames->first : mReader.getFirstFrame();
     }
 
-    /// Keeps what the call noticed.
+    /// Records the call's warnings.
     bool done(bool result) {
         for (const std::string& warning : lastWarnings()) {
             if (mKnownWarnings.insert(warning).second)
@@ -112,7 +112,7 @@ private:
         return result;
     }
 
-    /// Of each node the object that says most about it.
+    /// For each node the most specific object.
     bool readNodes() {
         for (const TreeNode& entry : nodesInOrder(*mReader.getScene())) {
             FbxNode& node = *entry.node;
@@ -195,7 +195,7 @@ private:
         }
     }
 
-    /// That of the stack, to the fraction of a frame, or the frames of the point caches.
+    /// The span of the stack, to the fraction of a frame, or the frames of the point caches.
     void setSpan(TnFbxWriteInfo& info, const FbxAnimStack* stack) const {
         if (mOptions.frames) {
             info.setStartFrame(static_cast<float>(mOptions.frames->first));
@@ -204,7 +204,7 @@ private:
         }
         const FbxTimeSpan span = stack ? stack->GetLocalTimeSpan() : FbxTimeSpan();
         if (!(span.GetStart() < span.GetStop()))
-            return; // the keys say how long it is
+            return; // the keys determine its length
         info.setStartFrame(frameOf(span.GetStart()));
         info.setEndFrame(frameOf(span.GetStop()));
     }
@@ -229,7 +229,7 @@ private:
     std::set<std::string> mKnownWarnings;
 };
 
-/// Where the library puts the point caches of a file.
+/// The folder of the library for the point caches of a file.
 filesystem::path cacheFolder(const filesystem::path& file) {
     return file.parent_path() / (file.stem().string() + "_fpc");
 }
@@ -238,7 +238,7 @@ bool toStandardOutput(const ConvertOptions& options) { return options.output == 
 
 bool writesCaches(const ConvertOptions& options) { return options.frames && options.cache != PointCache::none; }
 
-/// Whether the name ends like that of another kind of file.
+/// Whether the name has the extension of another kind of file.
 bool isOfAnotherKind(const std::string& output) {
     const std::string name = output.substr(output.find_last_of('/') + 1);
     const std::size_t dot = name.find_last_of('.');
@@ -250,7 +250,7 @@ bool isOfAnotherKind(const std::string& output) {
     return extension != ".fbx";
 }
 
-/// Why the output may not be written; empty when it may.
+/// Why the output must not be written; empty when it may.
 std::string refusal(const ConvertOptions& options) {
     if (toStandardOutput(options))
         return writesCaches(options) ? "has no place for point caches; --cache none leaves them out" : "";
@@ -269,7 +269,7 @@ std::string refusal(const ConvertOptions& options) {
     return {};
 }
 
-/// A folder of its own, which goes with this.
+/// A temporary folder, removed with the object.
 class TemporaryFolder {
 public:
     TemporaryFolder() {
@@ -298,7 +298,7 @@ bool writeOut(Convert& conversion, const ConvertOptions& options, std::string& r
         reason = lastError();
         return written;
     }
-    const TemporaryFolder folder; // a file is written back and forth, and a pipe only forth
+    const TemporaryFolder folder; // a file is written with seeks, and a pipe only forward
     const std::string file = folder.file("output.fbx");
     if (!conversion.write(file)) {
         reason = lastError();

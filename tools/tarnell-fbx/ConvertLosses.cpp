@@ -36,7 +36,7 @@ bool hasOwnProperties(const FbxObject& object) {
                        [](const FbxProperty& property) { return property.GetFlag(FbxPropertyFlags::eUserDefined); });
 }
 
-/// Properties of lights that are written as a new light has them.
+/// Properties of lights that are written with the values of a new light.
 struct LightExtra {
     const char* what;
     std::vector<const char*> properties;
@@ -83,7 +83,7 @@ private:
     int mSwitchedOff = 0;
 };
 
-/// The kind that a node with the attribute is written as, when it is asked for.
+/// The kind as which a node with the attribute is written, when it is selected.
 const char* kindOf(Attribute::EType type) {
     switch (type) {
     case Attribute::eMesh:
@@ -104,7 +104,7 @@ const char* kindOf(Attribute::EType type) {
     }
 }
 
-/// What is counted of the nodes of a scene.
+/// The counts for the nodes of a scene.
 struct NodeCounts {
     NodeCounts(FbxScene& scene, const Losses& losses) : extras(scene), asked(losses) {}
 
@@ -156,7 +156,7 @@ private:
         case Attribute::eNull:
         case Attribute::eMarker:
         case Attribute::eSkeleton:
-            break; // counted apart
+            break; // counted separately
         default:
             ++others;
         }

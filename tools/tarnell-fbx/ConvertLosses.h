@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What of a scene the library's objects have no place for, with counts.
+// What the library's objects cannot hold of a scene, with counts.
 #pragma once
 
 #include <string>
@@ -14,17 +14,17 @@ namespace tool {
 /// Sentences like "not written: materials: 3".
 class Losses {
 public:
-    /// About the kinds that are asked for, as in the options of `convert`: none are all.
+    /// For the selected kinds, as in the options of `convert`: none means all.
     explicit Losses(const std::vector<std::string>& kinds) : mKinds(kinds) {}
 
     [[nodiscard]] bool wants(const char* kind) const;
-    /// Nothing for a count of 0.
+    /// No effect for a count of 0.
     void add(int count, const std::string& what);
     [[nodiscard]] const std::vector<std::string>& sentences() const { return mSentences; }
 
-    /// All that is lost of the objects that are written. Surfaces must still be surfaces.
+    /// All losses of the written objects. Surfaces must not have been converted.
     void addScene(FbxScene& scene);
-    /// What stands in the file and in no scene: constraints, poses, characters, subdivision.
+    /// What is in the file but in no scene: constraints, poses, characters, subdivision.
     void addRecords(const std::string& file);
 
 private:

@@ -8,7 +8,7 @@
 
 namespace tool {
 
-/// The text as a field: in quotes where it has to be.
+/// The text as a field: in quotes where necessary.
 std::string csvField(const std::string& text);
 
 } // namespace tool

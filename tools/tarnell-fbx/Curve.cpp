@@ -25,7 +25,7 @@
 namespace tool {
 namespace {
 
-/// A channel that was asked for, and whose it is.
+/// A requested channel and its owner.
 struct ChosenChannel {
     const FbxObject* object;
     Channel channel;
@@ -38,7 +38,7 @@ struct FrameRange {
     [[nodiscard]] long long count() const { return last - first + 1; }
 };
 
-/// The object and what it consists of: a node's attributes answer for the node.
+/// The object and its parts: a node includes its attributes.
 std::vector<FbxObject*> withAttributes(FbxObject& object) {
     std::vector<FbxObject*> objects{&object};
     auto* node = FbxCast<FbxNode>(&object);
@@ -47,7 +47,7 @@ std::vector<FbxObject*> withAttributes(FbxObject& object) {
     return objects;
 }
 
-/// "Lcl Translation", "lcl translation" and "translation" all mean the first.
+/// "Lcl Translation", "lcl translation" and "translation" all select the first.
 FbxProperty findProperty(const FbxObject& object, const std::string& name) {
     for (const std::string& spelling : {name, "Lcl " + name}) {
         for (const bool exactly : {true, false}) {
@@ -59,7 +59,7 @@ FbxProperty findProperty(const FbxObject& object, const std::string& name) {
     return {};
 }
 
-/// Reads "NODE", "NODE.PROPERTY" or "NODE.PROPERTY.X" against a scene. Names may hold dots, so every dot is tried.
+/// Parses "NODE", "NODE.PROPERTY" or "NODE.PROPERTY.X" against a scene. Names may contain dots, so every dot is tried.
 class Target {
 public:
     Target(FbxScene& scene, const std::string& text, FbxAnimStack* take) : mTake(take) {
@@ -116,7 +116,7 @@ private:
             if (!only.empty() && strcasecmp(channel.name.c_str(), only.c_str()) != 0)
                 continue;
             added = true;
-            // A node answers for its attribute, which may have the same name.
+            // A node includes its attribute, which may have the same name.
             const bool isKnown = std::any_of(mChannels.begin(), mChannels.end(), [&](const ChosenChannel& each) {
                 return each.channel.property == channel.property && each.channel.component == channel.component;
             });
@@ -132,7 +132,7 @@ private:
     bool mFound = false;
 };
 
-/// Everything that one page is about.
+/// The content of one page.
 struct Curves {
     const SceneFile& file;
     FbxAnimStack* take;
@@ -163,7 +163,7 @@ FbxTimeSpan spanOfKeys(const std::vector<ChosenChannel>& channels) {
     return all;
 }
 
-/// What is sampled when nobody says which frames: the take, or the keys where it has no span.
+/// The default frames: those of the take, or those of the keys where it has no span.
 FrameRange defaultRange(const SceneFile& file, FbxAnimStack* take, const std::vector<ChosenChannel>& channels) {
     FbxTimeSpan span = take ? take->GetLocalTimeSpan() : FbxTimeSpan();
     if (span.GetStop() <= span.GetStart())
@@ -177,7 +177,7 @@ FrameRange defaultRange(const SceneFile& file, FbxAnimStack* take, const std::ve
     return range;
 }
 
-// ---- For people ----
+// ---- Text ----
 
 std::string shortNumber(double number) { return numberText(std::round(number * 1e6) / 1e6); }
 
@@ -199,7 +199,7 @@ const char* blendName(const FbxAnimLayer& layer) {
     }
 }
 
-/// What keeps a layer from counting in full.
+/// The settings that keep a layer from full effect.
 std::string layerRemarks(const FbxAnimLayer& layer) {
     std::string text;
     if (layer.BlendMode.Get() != FbxAnimLayer::eBlendAdditive)
@@ -309,7 +309,7 @@ void plot(const Curves& curves, Page& page) {
         plotChannel(curves, chosen, page, out);
 }
 
-// ---- For programs ----
+// ---- JSON ----
 
 void printCsv(const Curves& curves, Page& page) {
     std::ostream& out = page.begin();

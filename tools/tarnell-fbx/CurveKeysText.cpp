@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Keys in words.
+// Keys as text.
 #include "CurveKeysText.h"
 
 #include <algorithm>
@@ -81,7 +81,7 @@ KeyFacts factsOf(const FbxAnimCurve& curve, int key) {
 }
 
 Extrapolation extrapolation(FbxAnimCurveBase::EExtrapolationType type, unsigned long count) {
-    constexpr unsigned long kMost = 0x7FFFFFFF; // more means without end
+    constexpr unsigned long kMost = 0x7FFFFFFF; // more means endless
     const std::optional<long> times = count < kMost ? std::optional(static_cast<long>(count)) : std::nullopt;
     switch (type) {
     case FbxAnimCurveBase::eConstant:
@@ -98,7 +98,7 @@ Extrapolation extrapolation(FbxAnimCurveBase::EExtrapolationType type, unsigned 
     return {"unknown", {}};
 }
 
-/// Whether a weight is another than the usual third; old files have it with four digits.
+/// Whether a weight differs from the default third; old files have it with four digits.
 bool isUnusual(const std::optional<double>& weight) {
     constexpr double kClose = 1e-3;
     return weight && std::abs(*weight - static_cast<double>(Def::sDEFAULT_WEIGHT)) > kClose;

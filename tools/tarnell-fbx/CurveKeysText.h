@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a curve's keys say, in words.
+// A curve's keys as text.
 #pragma once
 
 #include <optional>
@@ -19,19 +19,19 @@ struct KeyFacts {
     float value = 0.0F;
     const char* interpolation = ""; ///< towards the next key: constant, next (the value of the next key), linear, cubic
     std::string tangent;            ///< auto, user, broken, auto broken, TCB; empty where there is none
-    bool clamped = false;           ///< flat where the neighbours are no further up or down
+    bool clamped = false;           ///< flat where the adjacent keys are not further up or down
     bool timeIndependent = false;
-    std::optional<double> leftSlope, rightSlope;   ///< in force, per second, where a cubic piece begins or ends
-    std::optional<double> leftWeight, rightWeight; ///< in force, of those sides: lengths of the handles
+    std::optional<double> leftSlope, rightSlope;   ///< effective, per second, where a cubic segment begins or ends
+    std::optional<double> leftWeight, rightWeight; ///< effective, on those sides: lengths of the handles
     std::optional<float> tension, continuity, bias;
 
-    /// What has no column of its own.
+    /// The values without a column of their own.
     [[nodiscard]] std::string remarks() const;
 };
 
 struct Extrapolation {
     const char* type = "constant"; ///< constant, repetition, mirror, slope, relative
-    std::optional<long> count;     ///< of repetitions; none: without end, or where nothing is repeated
+    std::optional<long> count;     ///< of repetitions; none: endless, or where nothing is repeated
 };
 
 std::vector<KeyFacts> keyFacts(FbxAnimCurve& curve);

@@ -31,7 +31,7 @@ std::vector<Channel> channelsOf(const FbxProperty& property, FbxAnimStack* take)
         channels.push_back({property, i, components == 1 ? "" : kNames[i], {}});
     FbxProperty driven = property;
     if (driven.GetSrcObjectCount<FbxAnimCurveNode>() == 0)
-        return channels; // most are so: not to be asked for on every layer
+        return channels; // most have none: avoids a look-up on every layer
     for (int i = 0; take && i < take->GetMemberCount<FbxAnimLayer>(); ++i) {
         auto* layer = take->GetMember<FbxAnimLayer>(i);
         const FbxAnimCurveNode* node = driven.GetCurveNode(layer);

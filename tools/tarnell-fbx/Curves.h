@@ -16,7 +16,7 @@ struct LayerCurve {
     FbxAnimCurve* curve;
 };
 
-/// One number of a property, and what drives it.
+/// One number of a property, and the curves that drive it.
 struct Channel {
     FbxProperty property;
     int component = 0;              ///< of the property's value
@@ -29,7 +29,7 @@ struct Channel {
     [[nodiscard]] double staticValue() const;
 };
 
-/// A property's channels, also those that nothing drives. Without a take nothing does.
+/// A property's channels, also those that are not driven. Without a take none is driven.
 std::vector<Channel> channelsOf(const FbxProperty& property, FbxAnimStack* take);
 
 /// How many keys all curves of the property have in the take.

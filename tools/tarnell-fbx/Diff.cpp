@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx diff: what two files say differently, for people, as a page for a browser, and as a document.
+// tarnell-fbx diff: the differences between two files, as text, as a page for a browser, and as JSON.
 #include <cmath>
 #include <iostream>
 
@@ -19,7 +19,7 @@
 namespace tool {
 namespace {
 
-// ---- For people ----
+// ---- Text ----
 
 std::string countsText(const std::vector<Difference>& found) {
     return found.empty() ? "no difference"
@@ -44,7 +44,7 @@ void printText(const DiffPage& page, std::ostream& out) {
     }
 }
 
-// ---- For programs ----
+// ---- JSON ----
 
 void textOrNull(JsonWriter& json, std::string_view key, const std::string& text) {
     json.key(key);

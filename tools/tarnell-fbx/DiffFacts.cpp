@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Two files side by side: what they are, which nodes they have, and what is on these.
+// Compares two files: their settings, their nodes, and the data of these.
 #include "DiffFacts.h"
 
 #include <algorithm>
@@ -21,7 +21,7 @@ using namespace Tarnell::Fbx;
 
 namespace {
 
-/// Gives each node its object: both are in the order of the tree, and some nodes have none.
+/// Assigns each node its object: both are in the order of the tree, and some nodes have none.
 template <class Object, class Kept>
 void assign(const std::vector<FbxNode*>& nodes, const FaithfulObjects<Object>& read,
             std::unordered_map<const FbxNode*, Kept>& objects) {
@@ -80,7 +80,7 @@ std::vector<Key> keysOf(const Channel& channel) {
 
 using KeysByName = std::map<std::string, std::vector<Key>>;
 
-/// Those of a node and of what stands on it. One name may belong to both; then the second has a prefix.
+/// The properties of a node and of its attributes. One name may occur in both; then the second has a prefix.
 KeysByName keysByName(FbxNode& node, FbxAnimStack* take) {
     KeysByName keys;
     const auto addAll = [&](const FbxObject& object) {
@@ -136,7 +136,7 @@ private:
 
 } // namespace
 
-// ---- What is compared ----
+// ---- The comparisons ----
 
 DiffSide::DiffSide(const DiffFile& side, const std::string& chosenTake)
     : file(side), takeName(chosenTake), stack(side.opened.chooseTake(chosenTake)), take(takeFacts(side.opened, stack)),
@@ -158,7 +158,7 @@ DiffMoments::DiffMoments(const TakeFacts& a, const TakeFacts& b)
     const double start = std::max(seconds(a.firstFrame, a.frameRate), seconds(b.firstFrame, b.frameRate));
     const double end = std::min(seconds(a.lastFrame, a.frameRate), seconds(b.lastFrame, b.frameRate));
     constexpr double kTolerance = 1e-3;
-    const double first = std::ceil(start * a.frameRate - kTolerance) + 0.0; // no minus before a zero
+    const double first = std::ceil(start * a.frameRate - kTolerance) + 0.0; // avoids negative zero
     const double last = std::floor(end * a.frameRate + kTolerance);
     if (last < first)
         return;
@@ -267,7 +267,7 @@ void compareLights(Comparison& comparison) {
 }
 
 void compareCurves(Comparison& comparison) {
-    // Keys of a node's place are numbers of its file's unit and axes.
+    // Keys of a node's transform are in its file's unit and axes.
     const bool sameSpace =
         comparison.a.unit == comparison.b.unit && comparison.a.cameras.axes == comparison.b.cameras.axes;
     const std::vector<Key> none;

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What two files say differently, as data: commands print it. Values are faithful ones, in centimetres and with Y up,
-// so that the same scene in another unit is the same scene.
+// The differences between two files as data for the commands to print. Values are faithful ones, in centimetres and
+// with so that the same scene in another unit is the same scene.
 #pragma once
 
 #include <optional>
@@ -35,19 +35,19 @@ const char* diffKindName(DiffKind kind);
 
 struct Difference {
     DiffKind kind = DiffKind::rate;
-    std::string object;           ///< a node's name, as the first file that has it spells it; empty for the file
+    std::string object;           ///< a node's name, as spelt in the first file that has it; empty for the file
     std::string what;             ///< "position", "focalLength", "Lcl Translation.X"
-    std::string a, b;             ///< what each file says; empty where it says nothing
+    std::string a, b;             ///< each file's value; empty where it has none
     std::optional<double> amount; ///< the largest difference, where it is a number
     std::string unit;             ///< of the amount: "cm", "°"
     std::optional<double> frame;  ///< of the first file, at which it is largest
-    int carried = 0;              ///< nodes below that are moved along by just this
+    int carried = 0;              ///< descendants that are moved by just this
 };
 
 struct DiffSettings {
     std::string take;                          ///< of both files; empty: the first of each
     double tolerance = 1e-4;                   ///< relative to the larger of 1 and the numbers
-    std::optional<std::pair<int, int>> frames; ///< at which mesh points are compared; else at the first frame
+    std::optional<std::pair<int, int>> frames; ///< at which mesh points are compared; else the first frame
 };
 
 /// A file that is compared, under the name by which it can be read.

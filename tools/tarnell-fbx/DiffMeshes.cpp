@@ -15,7 +15,7 @@ namespace {
 
 using MeshOf = std::unordered_map<const FbxNode*, const TnFbxMesh*>;
 
-/// Surfaces are read as meshes; those that cannot become one are passed over.
+/// Surfaces are read as meshes; those that cannot be converted are skipped.
 bool mayBeMesh(FbxNode& node) {
     const FbxNodeAttribute* attribute = node.GetNodeAttribute();
     switch (attribute ? attribute->GetAttributeType() : FbxNodeAttribute::eUnknown) {
@@ -89,7 +89,7 @@ public:
                   0};
     }
 
-    /// The worst of all frames so far.
+    /// The largest difference of all frames so far.
     std::optional<Difference> worst() const { return mMost < 0.0 ? std::nullopt : std::optional(mWorst); }
 
 private:

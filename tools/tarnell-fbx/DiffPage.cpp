@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Names from files stay names, whatever they hold.
+// Names from files are escaped, whatever they contain.
 #include "DiffPage.h"
 
 #include "CameraOrigins.h"

@@ -21,7 +21,7 @@ struct DiffPage {
 /// "position: (0, 0, 0) → (1, 0, 0), 1 cm apart at frame 12".
 std::string sentenceOf(const Difference& difference);
 
-/// One document that needs nothing else: no script, no network.
+/// A self-contained document: no script, no network.
 void writeDiffPage(const DiffPage& page, std::ostream& out);
 
 } // namespace tool

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Where nodes are in the world, frame by frame, and what cameras see.
+// Global transforms of nodes, frame by frame, and the optics of cameras.
 #include <algorithm>
 #include <array>
 #include <cmath>
@@ -29,7 +29,7 @@ bool changes(const TnFbxTransform& object) {
 
 double distance(const FbxVector4& a, const FbxVector4& b) { return lengthOf({a[0] - b[0], a[1] - b[1], a[2] - b[2]}); }
 
-/// A node in both files: axes without the unit, which scales the tops of the tree when files are brought to
+/// A node in both files: axes without the unit, which scales the topmost nodes when files are converted to
 /// centimetres.
 struct Places {
     FbxAMatrix a, b;
@@ -72,7 +72,7 @@ private:
             mComparison.found.push_back(std::move(each));
     }
 
-    /// How far apart the two are in one way, what to compare that with, and what each says.
+    /// The distance of the two in one quantity, its reference, and each value.
     struct Apart {
         double amount = 0.0, size = 1.0;
         std::string a, b;
@@ -101,7 +101,7 @@ private:
             found.push_back(std::move(worst));
     }
 
-    /// Most frames of most clips: nothing has to be worked out then.
+    /// Most frames of most clips: nothing needs to be computed then.
     bool hasSameValues(const PlacedPair& placed, const DiffMoment& moment) const {
         bool same = mComparison.a.unit == mComparison.b.unit &&
                     placed.a->getTransformRotationOrder() == placed.b->getTransformRotationOrder();
@@ -156,7 +156,7 @@ private:
                 std::max({1.0, lengthOf(a), lengthOf(b)}), text(a), text(b)};
     }
 
-    /// Whether what happened to the parent is just what happened to the child, at every frame.
+    /// Whether the change of the parent is the change of the child, at every frame.
     bool isCarried(const PlacedPair& child, const PlacedPair& parent) const {
         const std::size_t count = child.change() || parent.change() ? mComparison.moments.size() : 1;
         for (std::size_t i = 0; i < count; ++i) {
@@ -176,7 +176,7 @@ private:
     struct Reported {
         PlacedPair placed{};
         const FbxNode* parentOfB = nullptr; ///< the node's own counterpart
-        std::size_t index = 0;              ///< of the difference that tells it
+        std::size_t index = 0;              ///< of the difference that is reported
     };
     Comparison& mComparison;
     std::unordered_map<const FbxNode*, Reported> mReported;
@@ -198,7 +198,7 @@ constexpr std::array<OpticsRow, 7> kLens = {
      {"near", "cm", [](const CameraMoment& moment) { return moment.nearPlane; }},
      {"far", "cm", [](const CameraMoment& moment) { return moment.farPlane; }}}};
 
-/// What follows from the lens, the picture and the gate fit.
+/// The values derived from the lens, the picture and the gate fit.
 constexpr std::array<OpticsRow, 2> kPicture = {
     {{"pictureFovX", "°", [](const CameraMoment& moment) { return moment.pictureFovX; }},
      {"pictureFovY", "°", [](const CameraMoment& moment) { return moment.pictureFovY; }}}};

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the comparisons see of two files, and the comparisons themselves.
+// The data of two files for the comparisons, and the comparisons themselves.
 #pragma once
 
 #include <functional>
@@ -36,13 +36,13 @@ struct DiffSide {
     std::unordered_map<const FbxNode*, const CameraFacts*> cameraOf;
 };
 
-/// A moment that both files have, as a frame of each.
+/// A time that both files have, as a frame of each.
 struct DiffMoment {
     double a, b;
 };
 
-/// The frames that both takes have, or the first one of each where they have none in common. None is kept: a take may
-/// claim any number of them, and where nothing changes the first one is all that is asked for.
+/// The frames that both takes have, or the first one of each where they have none in common. None is stored: a take may
+/// claim any number of them, and where nothing changes only the first one is used.
 class DiffMoments {
 public:
     DiffMoments(const TakeFacts& a, const TakeFacts& b);
@@ -59,7 +59,7 @@ private:
     std::size_t mCount = 1;
 };
 
-/// Both files, and what was found so far.
+/// Both files, and the differences found so far.
 class Comparison {
 public:
     Comparison(const DiffFile& a, const DiffFile& b, const DiffSettings& settings);
@@ -75,13 +75,13 @@ public:
     void add(DiffKind kind, const std::string& object, std::string what, std::string saysA, std::string saysB) {
         found.push_back({kind, object, std::move(what), std::move(saysA), std::move(saysB), {}, {}, {}, 0});
     }
-    /// Adds a number at the moment where it differs most, if it does. Where neither changes one moment is enough.
+    /// Adds a number at the time where it differs most, if it does. Where neither changes one time is enough.
     void addWorst(Difference difference, bool changes, const std::function<std::pair<double, double>(DiffMoment)>& at);
 };
 
 void compareFiles(Comparison& comparison);      // rate, unit, axes, takes
 void compareTrees(Comparison& comparison);      // nodes
-void compareTransforms(Comparison& comparison); // where nodes are
+void compareTransforms(Comparison& comparison); // transforms of nodes
 void compareCameras(Comparison& comparison);
 void compareLights(Comparison& comparison);
 void compareCurves(Comparison& comparison);

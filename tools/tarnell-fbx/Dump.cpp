@@ -32,7 +32,7 @@ namespace {
 
 using namespace Tarnell::Fbx;
 
-/// Prints the parts that objects are made of.
+/// Prints the parts of objects.
 class ObjectPrinter {
 public:
     ObjectPrinter(JsonWriter& json, bool samples) : mJson(json), mSamples(samples) {}
@@ -119,7 +119,7 @@ public:
     }
 
 private:
-    /// Markers do not hand out their channels.
+    /// Markers give no access to their channels.
     static TnFbxChannel copyOf(const TnFbxMarker& marker, TnFbxMarker::EFbxMarkerChannelType channel) {
         TnFbxChannel copy;
         copy.setValue(marker.getValue(channel));
@@ -196,7 +196,7 @@ private:
     bool mSamples;
 };
 
-/// One file, loaded once, and everything that is asked of it.
+/// One file, loaded once, and all queries to it.
 class Dump {
 public:
     Dump(const DumpOptions& options, std::ostream& out)
@@ -206,7 +206,7 @@ public:
             mInfo.setFidelity(kFbxFidelityFaithful);
             mInfo.setAnimationStackName(options.stack);
         } else {
-            mInfo.setAnimationStackName("*"); // any name will do: the first stack is read
+            mInfo.setAnimationStackName("*"); // any name is accepted: the first stack is read
         }
         mInfo.setGlobalTransform(!options.local);
         mInfo.setTransformPoints(options.transformPoints);
@@ -220,7 +220,7 @@ public:
             mInfo.setObjectName(*options.name);
     }
 
-    /// Empty when the file was read, else why it was not.
+    /// Empty when the file was read, else the reason.
     std::string load() {
         if (mOptions.faithful) {
             const std::string fault = mFacts.load(mOptions.file);
@@ -247,7 +247,7 @@ public:
         return complete;
     }
 
-    /// Whether there is anything of the name that was asked for, of the kinds that were.
+    /// Whether there is anything of the requested name, of the requested kinds.
     bool finds() {
         const auto isFound = [this](const Kind& kind) {
             const bool isThere = mOptions.faithful ? mFacts.has(kind.name, *mOptions.name) : count(kind) > 0;
@@ -277,7 +277,7 @@ private:
         mJson.text(mFacts.axes());
     }
 
-    /// What stands around the values of an object when they are faithful.
+    /// The additional keys of an object when its values are faithful.
     template <class Object>
     void printSurroundings(const Object& object) {
         const char* const space = mOptions.local ? "parent" : "world";
@@ -295,7 +295,7 @@ private:
         }
         if constexpr (std::is_same_v<Object, TnFbxCamera>) {
             mJson.key("producer");
-            mJson.boolean(false); // they are not handed out
+            mJson.boolean(false); // they are not accessible
         }
     }
 
@@ -342,7 +342,7 @@ private:
     template <class Object>
     using Fill = bool (FbxSdk::*)(TnFbxReadInfo&, Object*, int);
 
-    /// Reads all objects of one kind, or the named one, and hands each to `each`.
+    /// Reads all objects of one kind, or the named one, and passes each to `each`.
     template <class Object, class Each>
     bool read(const Kind& kind, Fill<Object> fill, const Each& each) {
         Object* made = nullptr;

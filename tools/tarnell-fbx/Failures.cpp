@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// How the commands say that something went wrong.
+// Error output of the commands.
 #include <exception>
 #include <iostream>
 #include <new>
@@ -15,9 +15,9 @@ namespace tool {
 std::string spoken(const std::string& text) { return terminalText(withoutKeptName(text)); }
 
 void printError(const std::string& file, const std::string& reason) {
-    // The library's sentences begin with the file already.
+    // The library's messages begin with the file already.
     const std::string sentence = spoken(reason), start = spoken(file) + ": ";
-    // In one piece: several files may fail at once.
+    // In one write: several files may fail at once.
     std::cerr << "tarnell-fbx: " + (sentence.rfind(start, 0) == 0 ? "" : start) + sentence + '\n';
 }
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Objects as the library reads them faithfully, for commands that show what the application shows.
+// Faithful reads for commands that show what the application shows.
 #pragma once
 
 #include <cstddef>
@@ -31,7 +31,7 @@ inline Tarnell::Fbx::TnFbxReadInfo faithfulInfo(const std::string& file, const s
     return info;
 }
 
-/// Everything of a kind, in the order of the tree. Throws Unreadable.
+/// All objects of a kind, in the order of the tree. Throws Unreadable.
 template <class Object>
 FaithfulObjects<Object> readFaithfully(Tarnell::Fbx::TnFbxReadInfo info,
                                        bool (Tarnell::Fbx::Fbx::*read)(Tarnell::Fbx::TnFbxReadInfo&, Object**, int&)

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a file says of itself before it is normalised, for documents that show more than values.
+// The settings of a file before it is normalised, for documents that contain more than values.
 #pragma once
 
 #include <fbxsdk.h>
@@ -21,7 +21,7 @@ public:
     FileFacts(const FileFacts&) = delete;
     FileFacts& operator=(const FileFacts&) = delete;
 
-    /// Empty when the file was read, else why it was not.
+    /// Empty when the file was read, else the reason.
     std::string load(const std::string& file);
 
     [[nodiscard]] double unitInCentimetres() const;
@@ -32,14 +32,14 @@ public:
 
     /// Whether a node of the kind has the name.
     [[nodiscard]] bool has(const std::string& kind, const std::string& name) const;
-    /// Starts anew with the nodes of a kind, as the library lists them.
+    /// Starts again with the nodes of a kind, as the library lists them.
     void beginNodes(const std::string& kind);
     /// The name of the parent of the next node of that name; nothing below the root.
     std::optional<std::string> parentOfNext(const std::string& name);
 
 private:
     fbxsdk::FbxManager* mManager = nullptr; // owned
-    fbxsdk::FbxScene* mScene = nullptr;     // the manager's
+    fbxsdk::FbxScene* mScene = nullptr;     // owned by the manager
     std::vector<fbxsdk::FbxNode*> mNodes;
     std::size_t mNext = 0;
 };

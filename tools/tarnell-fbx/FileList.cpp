@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Patterns of file names. A shell expands most of them; those in quotes, in job files and in render queues come here.
+// Patterns of file names. A shell expands most of them; quoted ones, and those in job files and render queues, remain.
 #include "FileList.h"
 
 #include <filesystem>

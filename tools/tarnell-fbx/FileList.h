@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The files that a command line means.
+// The files of a command line.
 #pragma once
 
 #include <string>
@@ -11,10 +11,10 @@ namespace tool {
 
 struct FileList {
     std::vector<std::string> files;
-    std::vector<std::string> unmatched; ///< patterns that stand for no file
+    std::vector<std::string> unmatched; ///< patterns that match no file
 };
 
-/// Patterns ("shots/*.fbx") are replaced by the files that they stand for, in the order of their names; a name that is
+/// Patterns ("shots/*.fbx") are replaced by the files that they match, in the order of their names; a name that is
 /// a file, and one without *, ? and [, stays as it is. "-" is standard input.
 FileList expandFiles(const std::vector<std::string>& names);
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx info: one screen per file, for people, or a document. These are facts of the file itself, before any
+// tarnell-fbx info: a summary per file, as text or JSON. These are facts of the file itself, before any
 // conversion, so they come from the platform.
 #include <filesystem>
 #include <map>
@@ -34,7 +34,7 @@ struct CacheFault {
     std::string mesh, reason;
 };
 
-/// What info says about a file.
+/// The data of `info` for one file.
 struct Facts {
     int version = 0;
     bool ascii = false;
@@ -116,7 +116,7 @@ Facts factsOf(const std::string& file, const SceneFile& opened) {
     return facts;
 }
 
-// ---- For people ----
+// ---- Text ----
 
 std::string versionText(int version) {
     const std::string text = std::to_string(version / 1000) + '.' + std::to_string(version / 100 % 10);
@@ -139,7 +139,7 @@ std::string kindsText(const std::map<std::string, int>& kinds) {
     return text.empty() ? "none" : text;
 }
 
-/// A node of the tree on its way to the screen.
+/// A node of the tree as displayed.
 struct TreeLine {
     FbxNode* node;
     std::string indent;
@@ -196,7 +196,7 @@ void printText(const Facts& facts, FbxNode& root, Page& page) {
         lines.line("Repaired", terminalText(repair));
 }
 
-// ---- For programs ----
+// ---- JSON ----
 
 void printStacks(const std::vector<Stack>& stacks, JsonWriter& json) {
     json.key("stacks");

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What `info` says about a file, for documents that say more.
+// The data of `info`, for documents that contain more.
 #pragma once
 
 #include <string>

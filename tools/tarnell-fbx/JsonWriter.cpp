@@ -23,10 +23,10 @@ void JsonWriter::text(std::string_view value) {
         mOut << '"' << value << '"';
         return;
     }
-    // Names may hold anything; what is no UTF-8 becomes the replacement character.
+    // Names may contain anything; invalid UTF-8 becomes the replacement character.
     const std::string text =
         nlohmann::json(std::string(value)).dump(-1, ' ', false, nlohmann::json::error_handler_t::replace);
-    // JSON allows the last control character of ASCII and those of the upper half, but terminals obey them.
+    // JSON allows the last control character of ASCII and those of the upper half, but terminals interpret them.
     std::string escaped;
     for (std::size_t i = 0; i < text.size(); ++i) {
         const bool isControl = text[i] == '\xC2' && static_cast<unsigned char>(text[i + 1]) < 0xA0;
@@ -48,7 +48,7 @@ void JsonWriter::reals(float value, std::size_t count) {
     if (count == 0)
         return;
     real(value);
-    std::string next = ","; // what each of the others adds
+    std::string next = ","; // the size that each of the others adds
     if (mPretty)
         next += '\n' + std::string(2 * mLevels.size(), ' ');
     char digits[32];

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// JSON as it goes out: no tree is built, so a mesh of millions of points costs no memory.
+// Streaming JSON output: no tree is built, so a mesh of millions of points takes no memory.
 #pragma once
 
 #include <charconv>
@@ -28,13 +28,13 @@ public:
     void null() { raw("null"); }
     void boolean(bool value) { raw(value ? "true" : "false"); }
     void integer(long long value) { number(value); }
-    /// A number that is spelt already; null for what is no JSON number (NaN and infinities).
+    /// A number that is already formatted; null for what is no JSON number (NaN and infinities).
     void digits(std::string_view spelling) { raw(spelling.find_first_of("in") == spelling.npos ? spelling : "null"); }
     void natural(unsigned long long value) { number(value); }
     /// Shortest digits that read back as the same number; null for NaN and infinities.
     void real(float value) { finite(value); }
     void real(double value) { finite(value); }
-    /// The same value so many times, as elements of an array.
+    /// The same value that many times, as elements of an array.
     void reals(float value, std::size_t count);
 
     // A key and its value.
@@ -46,7 +46,7 @@ public:
 private:
     void open(char bracket);
     void close(char bracket);
-    /// The comma or line break that stands before the next value.
+    /// The comma or line break before the next value.
     void separate();
     void raw(std::string_view characters) {
         separate();

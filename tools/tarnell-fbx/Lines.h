@@ -13,7 +13,7 @@
 
 namespace tool {
 
-/// Prints "  Label         text". The text holds nothing that a terminal would obey.
+/// Prints "  Label         text". The text contains no control characters.
 class Lines {
 public:
     Lines(std::ostream& out, const Terminal& terminal) : mOut(out), mTerminal(terminal) {}

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx lint: what tends to go wrong with a file between programs.
+// tarnell-fbx lint: likely problems of a file in other programs.
 #include <algorithm>
 #include <iostream>
 #include <map>
@@ -23,7 +23,7 @@ std::size_t countOf(const std::vector<Finding>& findings, Severity severity) {
         findings.begin(), findings.end(), [severity](const Finding& each) { return each.rule->severity == severity; }));
 }
 
-/// Notes alone are no reason to stop.
+/// Notes by themselves are not a failure.
 int statusOf(const std::vector<Finding>& findings) {
     return countOf(findings, Severity::note) == findings.size() ? kSuccess : kUnreadable;
 }
@@ -39,7 +39,7 @@ std::string summary(const std::vector<Finding>& findings) {
     return text.empty() ? "nothing found" : text;
 }
 
-// ---- For people ----
+// ---- Text ----
 
 /// Of a rule that finds more, the rest are counted.
 constexpr std::size_t kMostShown = 20;
@@ -73,7 +73,7 @@ void printText(const std::vector<Finding>& findings, Page& page) {
     }
 }
 
-// ---- For programs ----
+// ---- JSON ----
 
 void printRule(const LintRule& rule, JsonWriter& json) {
     json.text("rule", rule.id);

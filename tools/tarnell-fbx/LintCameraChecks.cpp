@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Lens, film and place of cameras.
+// Checks of cameras: lens, film and placement.
 #include <algorithm>
 #include <cmath>
 
@@ -117,7 +117,7 @@ void clipPlanes(const LintContext& context, LintReport& report) {
 }
 
 void clipPlanesFarApart(const LintContext& context, LintReport& report) {
-    // A float keeps 24 bits: with planes further apart most of them are spent right before the camera.
+    // A float has 24 bits: with planes further apart most of its precision is used close to the camera.
     constexpr double kMostRatio = 16777216.0;
     for (const CameraFacts& camera : context.cameras.cameras) {
         const CameraMoment moment = firstMoment(context, camera);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the checks of the rules see, and the checks themselves; each knows one rule and reports what it finds.
+// The data for the checks of the rules, and the checks themselves; each implements one rule and reports its findings.
 #pragma once
 
 #include <functional>
@@ -30,7 +30,7 @@ struct LintContext {
     const SceneFile& file;
     std::vector<FbxAnimStack*> stacks;
     std::vector<TakeFacts> takes; ///< of the stacks
-    TakeFacts first;              ///< the first take, or what there is without one
+    TakeFacts first;              ///< the first take, or a default without one
     std::vector<TreeNode> nodes;
     std::vector<FbxObject*> objects;
     std::vector<FbxMesh*> meshes;
@@ -58,7 +58,7 @@ LintCheck rateUnstated, keysBetweenFrames, spanDiffersFromKeys, takeWithoutSpan,
 // Cameras.
 LintCheck lensOutOfRange, lensValuesDisagree, filmShapeDiffers, filmFormatDisagrees, squeezedFilm, filmOffset,
     clipPlanes, clipPlanesFarApart, cameraScale, rollWithoutTarget, interestElsewhere, imageShiftNotRead, noResolution;
-// The file, and where things are.
+// The file, and placement.
 LintCheck notReadable, repaired, oldVersion, asciiEncoding, unitShiftsOptics, axesShiftOptics, leftHanded,
     farFromOrigin, meshAtOrigin, zeroScale, mirroredNode, shearedNode, inheritedScale, notFinite;
 // Names and structure.
@@ -67,10 +67,10 @@ LintCheck duplicateNames, unnamedNodes, oddNames, constraints, curveThatStopsThr
 LintCheck polygonsOutOfRange, smallPolygons, meshWithoutPolygons, meshWithoutNormals, cacheMissing, cacheForeignPath,
     cacheUnusable, cacheRange, cacheRate;
 
-/// What people call the object: a camera or mesh by its node.
+/// The name of the object for display: a camera or mesh by its node.
 std::string nameOf(const FbxObject& object);
 
-/// The records of the file's objects, as they stand in it: what the scene has no place for, or has mended already.
+/// The records of the file's objects, unchanged: including what the scene cannot hold, or has repaired.
 void forEachObjectRecord(const std::string& file, const std::function<void(const extensions::FileRecord&)>& work);
 
 /// "1 key", "3 keys".

@@ -32,7 +32,7 @@ std::size_t numberCount(const extensions::FileRecord& record) {
     return value.type == extensions::RecordValue::eList ? value.count : record.valueCount();
 }
 
-/// The name without its class: "Geometry::tri" in a text, with the two the other way round in a binary file.
+/// The name without its class: "Geometry::tri" in an ASCII file, with the two in reverse order in a binary file.
 std::string objectName(const extensions::FileRecord& record) {
     for (std::size_t i = 0; i < record.valueCount(); ++i) {
         const extensions::RecordValue value = record.value(i);
@@ -70,7 +70,7 @@ void forEachCache(const LintContext& context, const std::function<void(const Use
     }
 }
 
-/// What a cache that was found holds; false where it cannot be looked into.
+/// The content of a cache that was found; false where it cannot be inspected.
 bool readFacts(const UsedCache& used, extensions::CacheFacts& facts) {
     FbxStatus status;
     return !used.path.empty() && extensions::readCacheFacts(used.path.c_str(), /*verify=*/false, facts, status) &&

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The table of rules, and what they look at.
+// The table of rules, and the traversal for their checks.
 #include "LintRules.h"
 
 #include <algorithm>
@@ -100,7 +100,7 @@ const std::vector<LintRule> kRules = {
     {"no-resolution", kNote,
      "Without a resolution the shape of the picture, and so the gate fit, is the reader's guess.",
      "Set the resolution of the render and save again.", noResolution},
-    // Where things are.
+    // Placement.
     {"far-from-origin", kWarning,
      "Floats this far out are so coarse that things jitter and seams open; hosts keep places as floats.",
      "Move the scene to the origin, and keep the offset apart.", farFromOrigin},
@@ -205,7 +205,7 @@ void forEachObjectRecord(const std::string& file, const std::function<void(const
     if (!records)
         throw Unreadable(status.GetErrorString());
     for (extensions::FileRecord top = records->first(); top; top = top.nextSibling()) {
-        work(top); // before 6.0 objects stand at the top
+        work(top); // before 6.0 objects are at the top level
         for (extensions::FileRecord record = top.firstChild(); top.name() == "Objects" && record;
              record = record.nextSibling())
             work(record);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What tends to go wrong with a file between programs, as data: commands print it.
+// Likely problems of a file in other programs, as data for the commands to print.
 #pragma once
 
 #include <string>
@@ -11,7 +11,7 @@
 
 namespace tool {
 
-/// note: somebody may want to know. warning: programs will differ. error: something is lost or undefined.
+/// note: worth knowing. warning: programs will differ. error: something is lost or undefined.
 enum class Severity { note, warning, error };
 const char* severityName(Severity severity);
 
@@ -35,8 +35,8 @@ struct Finding {
     std::string text;
 };
 
-/// What the rules find in a file, all of them or those with the ids. Values are those of a faithful read of the first
-/// take.
+/// The findings of the rules in a file, of all of them or those with the ids. Values are those of a faithful read of
+/// the first take.
 std::vector<Finding> lintFindings(const std::string& file, const SceneFile& opened,
                                   const std::vector<std::string>& ids = {});
 

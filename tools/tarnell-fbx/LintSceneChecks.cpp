@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The file as a whole, where things are in it, and what they are called.
+// Checks of the file as a whole, of placement and of names.
 #include <algorithm>
 #include <cmath>
 #include <map>
@@ -124,7 +124,7 @@ void leftHanded(const LintContext& context, LintReport& report) {
 }
 
 void farFromOrigin(const LintContext& context, LintReport& report) {
-    // From here on neighbouring floats are further apart than a tenth of a millimetre.
+    // From here on adjacent floats are further apart than a tenth of a millimetre.
     constexpr double kFar = 131072.0;
     for (const TreeNode& each : context.nodes) {
         const double away = lengthOf(context.worldOf(*each.node).GetT()) * context.unit();

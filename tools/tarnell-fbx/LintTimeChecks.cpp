@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Rates, takes and keys.
+// Checks of rates, takes and keys.
 #include <cmath>
 
 #include "CameraOrigins.h"
@@ -15,7 +15,7 @@ std::string framesText(const std::pair<double, double>& seconds, double rate) {
     return rounded(seconds.first * rate, 3) + " to " + rounded(seconds.second * rate, 3);
 }
 
-/// A key this near to a whole frame stands on it: files round the ticks of odd rates.
+/// A key this close to a whole frame is on it: files round the ticks of fractional rates.
 constexpr double kFrameTolerance = 0.005;
 
 } // namespace
@@ -56,7 +56,7 @@ void spanDiffersFromKeys(const LintContext& context, LintReport& report) {
     constexpr double kHalfAFrame = 0.5;
     for (const TakeFacts& take : context.takes) {
         if (!take.span || !take.keys || take.keys->first == take.keys->second)
-            continue; // keys at one moment hold for ever
+            continue; // keys at one time only hold endlessly
         const double start = (take.keys->first - take.span->first) * take.frameRate;
         const double end = (take.keys->second - take.span->second) * take.frameRate;
         if (std::abs(start) > kHalfAFrame || std::abs(end) > kHalfAFrame)

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Options that several commands share, and those of each command that looks into files.
+// Options common to several commands, and those of each command that inspects files.
 #include "LookCommands.h"
 
 #include <algorithm>
@@ -37,7 +37,7 @@ std::string parseFrames(const std::string& text, std::optional<std::pair<int, in
     return {};
 }
 
-/// A whole number from `least` on; the command line's own conversion would take other things as well.
+/// A whole number from `least` on; the command line's own conversion accepts other texts as well.
 void addCount(CLI::App& command, const char* name, int& count, int least, const char* help) {
     command
         .add_option_function<std::string>(
@@ -79,7 +79,7 @@ void addTake(CLI::App& command, std::string& take) {
         ->type_name("NAME");
 }
 
-/// A command whose options live as long as it can be run.
+/// A command whose options exist as long as it can be run.
 template <class Options>
 std::pair<CLI::App*, Options*> addCommand(CLI::App& app, std::function<int()>& chosen, const char* name,
                                           const char* help, int (*work)(const Options&)) {
@@ -144,7 +144,7 @@ void addCache(CLI::App& app, std::function<int()>& chosen) {
     command->add_flag("--samples", options->samples, "Every sample with its place");
 }
 
-/// A number from 0 on; the command line's own conversion would take infinities and NaN.
+/// A number from 0 on; the command line's own conversion accepts infinities and NaN.
 std::string parseTolerance(const std::string& text, double& tolerance) {
     double number = -1.0;
     const char* const end = text.data() + text.size();
@@ -237,7 +237,7 @@ void addReport(CLI::App& app, std::function<int()>& chosen) {
     command->add_flag("--force", options->force, "Overwrite the page also where it is no report");
 }
 #else
-void addReport(CLI::App&, std::function<int()>&) {} // main says why
+void addReport(CLI::App&, std::function<int()>&) {} // main prints the reason
 #endif
 
 } // namespace

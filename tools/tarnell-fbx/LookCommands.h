@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The options of the commands that look into files.
+// The options of the commands that inspect files.
 #pragma once
 
 #include <functional>
@@ -13,7 +13,7 @@
 
 namespace tool {
 
-/// Adds info, tree, props, curve, cache, records and, where it was built, report. The one that is parsed leaves its
+/// Adds info, tree, props, curve, cache, records and, where it was built, report. The one that is parsed stores its
 /// work in `chosen`.
 void addLookCommands(CLI::App& app, std::function<int()>& chosen);
 

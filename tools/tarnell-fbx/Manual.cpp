@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Manual page and completions: each walks over the same list of commands.
+// Manual page and completions: both traverse the same list of commands.
 #include "Manual.h"
 
 #include <functional>
@@ -11,8 +11,8 @@ namespace tool {
 namespace {
 
 struct OptionFacts {
-    std::vector<std::string> names; ///< "--json", "-h"; empty for what stands by itself
-    std::string value;              ///< what follows it: "N"; the name of what stands by itself
+    std::vector<std::string> names; ///< "--json", "-h"; empty for positional arguments
+    std::string value;              ///< its argument: "N"; the name of a positional argument
     std::string help;
     bool repeated = false;
 };
@@ -59,7 +59,7 @@ std::string joined(const std::vector<std::string>& words, const char* between) {
     return text;
 }
 
-/// Replaces characters that mean something in a language.
+/// Escapes characters with a meaning in a language.
 std::string escaped(const std::string& text, const std::function<std::string(char)>& escape) {
     std::string result;
     for (const char character : text)

@@ -14,7 +14,7 @@ namespace tool {
 /// The manual page, in the language of man(7).
 void writeManual(const CLI::App& app, std::ostream& out);
 
-/// What completes command lines in bash, zsh or fish. False for another shell.
+/// The completion script for bash, zsh or fish. False for another shell.
 bool writeCompletion(const CLI::App& app, const std::string& shell, std::ostream& out);
 
 } // namespace tool

@@ -48,7 +48,7 @@ private:
         matchChildren(a, b);
     }
 
-    /// Everything below a pair, level by level: trees may be as deep as they like.
+    /// All descendants of a pair, level by level: trees may have any depth.
     void matchChildren(FbxNode& topA, FbxNode& topB) {
         std::deque<NodePair> waiting{{&topA, &topB}};
         while (!waiting.empty()) {
@@ -126,10 +126,10 @@ private:
                 meshA->GetPolygonCount() == meshB->GetPolygonCount());
     }
 
-    /// What is left below a parent: for each kind the only node, or null where there are several.
+    /// The unmatched nodes below a parent: for each kind the only node, or null where there are several.
     using LeftByKind = std::map<std::string_view, FbxNode*>;
 
-    /// The only node of the kind that is left below the parent's counterpart, where this is the only one here, too.
+    /// The only unmatched node of the kind below the parent's counterpart, where this is the only one here, too.
     FbxNode* onlySibling(FbxNode& node) {
         const auto parent = mOfA.find(node.GetParent());
         if (parent == mOfA.end())
@@ -138,7 +138,7 @@ private:
         return onlyLeft(*node.GetParent(), kind, mOfA) ? onlyLeft(*parent->second, kind, mOfB) : nullptr;
     }
 
-    /// Asked for after all that match otherwise do, so that what is left is counted once per parent.
+    /// Called after all other matches, so that the unmatched nodes are counted once per parent.
     template <class Known>
     FbxNode* onlyLeft(FbxNode& parent, std::string_view kind, const Known& known) {
         const auto [counted, isNew] = mLeft.try_emplace(&parent);

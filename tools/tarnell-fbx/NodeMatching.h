@@ -15,10 +15,10 @@ struct NodePair {
     FbxNode* b = nullptr;
 };
 
-/// Nodes that belong together, parents before children. Children of one pair match by their names, several of one name
-/// in their order; what is left matches by a name that only one node on either side still has (it was moved), and then
-/// by its number in the file, or as the only child of its kind that is left below a pair (it was renamed). Producer
-/// cameras, and what hangs nowhere, are no part of it.
+/// Pairs of nodes, parents before children. Children of one pair match by their names, several of one name
+/// in their order; the remaining ones match by a name that is unique among them on both sides (moved), and then
+/// by their number in the file, or as the only remaining child of its kind below a pair (renamed). Producer
+/// cameras, and unparented nodes, are not included.
 std::vector<NodePair> matchNodes(FbxScene& a, FbxScene& b);
 
 /// Parents before children, in the order in which a faithful read has them.

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The arithmetic of lenses and film: angles, the gate that a picture leaves of a film, and film backs that have names.
+// The arithmetic of lenses and film: angles, gate fit, and film backs with names.
 #pragma once
 
 #include <optional>
@@ -17,23 +17,23 @@ struct FilmSize {
     [[nodiscard]] double aspect() const { return width / height; }
 };
 
-/// How film and picture are brought together where their shapes differ, numbered as in FBX.
+/// How film and picture are fitted where their shapes differ, numbered as in FBX.
 enum class GateFit { none, vertical, horizontal, fill, overscan, stretch };
-/// "none", "vertical", …; a number that is none of them counts as none.
+/// "none", "vertical", …; an unknown number counts as none.
 GateFit gateFitOf(int number);
 const char* gateFitName(GateFit fit);
 
-/// What a picture of that aspect shows of the film plane: one side is the film's, the other follows. All of the film
+/// The part of the film plane in a picture of that aspect: one side is the film's, the other follows. All of the film
 /// without a fit, and where the film is stretched.
 FilmSize pictureGate(const FilmSize& film, double pictureAspect, GateFit fit);
 
 /// The angle, in degrees, over a side of the film.
 double angleOver(double inches, double focalLengthMillimetres);
 
-/// The name of a film back or sensor of that size, to a thousandth of an inch or so; empty when it has none.
+/// The name of a film back or sensor of that size, to about a thousandth of an inch; empty when it has none.
 std::string knownGate(const FilmSize& film);
 
-/// Size and squeeze of a format that a camera can name; nothing for "custom" and for numbers that are no format.
+/// Size and squeeze of a camera's film format; nothing for "custom" and for numbers that are no format.
 struct NamedFormat {
     const char* name;
     FilmSize film;

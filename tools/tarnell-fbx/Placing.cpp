@@ -10,7 +10,7 @@ namespace {
 
 using Tarnell::Fbx::TnFbxTransform;
 
-/// Axes in the order in which they are turned about, by the library's numbers.
+/// Axes in the order of rotation, by the library's numbers.
 constexpr std::array<std::array<int, 3>, 6> kTurns = {
     {{0, 1, 2}, {0, 2, 1}, {1, 0, 2}, {1, 2, 0}, {2, 0, 1}, {2, 1, 0}}};
 

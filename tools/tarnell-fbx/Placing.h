@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From the channels of a faithful transform to its matrix.
+// Conversion of the channels of a faithful transform to its matrix.
 #pragma once
 
 #include <array>
@@ -12,7 +12,7 @@
 
 namespace tool {
 
-/// Position · rotation · shear · scale at a frame, the right one first.
+/// Position · rotation · shear · scale at a frame, the rightmost applied first.
 FbxAMatrix placeAt(const Tarnell::Fbx::TnFbxTransform& object, double frame);
 
 double lengthOf(const FbxVector4& vector);

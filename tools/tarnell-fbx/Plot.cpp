@@ -73,7 +73,7 @@ std::vector<std::string> brailleLines(const std::vector<double>& values, std::si
         const double part = span > 0.0 ? (range.high / 2 - value / 2) / span : 0.5;
         const auto y = static_cast<std::size_t>(std::lround(part * lowest));
         const std::size_t from = before.value_or(y);
-        // Up to the height of the last dot, so that steep curves have no holes.
+        // Up to the height of the last dot, so that steep curves have no gaps.
         for (std::size_t each = std::min(from, y); each <= std::max(from, y); ++each)
             canvas.set(x, each);
         before = y;

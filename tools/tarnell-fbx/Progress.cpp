@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Progress, printed on a thread of its own: whoever works may be busy for long between two things to say.
+// Progress, printed on a thread of its own: work may take long between two messages.
 #include "Progress.h"
 
 #include <chrono>
@@ -15,7 +15,7 @@ namespace {
 
 constexpr auto kPatience = std::chrono::seconds(1);
 constexpr auto kBetweenLines = std::chrono::milliseconds(100);
-constexpr std::size_t kMostColumns = 78; // a line that breaks cannot be taken back
+constexpr std::size_t kMostColumns = 78; // a wrapped line cannot be erased
 
 } // namespace
 
@@ -50,7 +50,7 @@ void Progress::work(const std::stop_token& stop) {
     }
 }
 
-/// Replaces the line that is shown. The mutex is held.
+/// Replaces the displayed line. The mutex is held.
 void Progress::show() {
     if (mText == mShown)
         return;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A line on standard error that says what is going on, for people who wait.
+// A progress line on standard error.
 #pragma once
 
 #include <condition_variable>
@@ -13,8 +13,8 @@
 
 namespace tool {
 
-/// Nothing when standard error is no terminal, and nothing before a second has gone by, however long a single step
-/// takes. Gone when the object is.
+/// Nothing is shown when standard error is no terminal, and within the first second, however long a single step
+/// takes. Removed with the object.
 class Progress {
 public:
     Progress();
@@ -22,9 +22,9 @@ public:
     Progress(const Progress&) = delete;
     Progress& operator=(const Progress&) = delete;
 
-    /// What is being done from now on.
+    /// The current step.
     void say(const std::string& text);
-    /// Takes the line away until something is said again, for others who write on the terminal.
+    /// Removes the line until the next message, for other output to the terminal.
     void hide();
 
 private:
@@ -34,7 +34,7 @@ private:
     std::mutex mMutex;
     std::condition_variable_any mChanged;
     std::string mText, mShown;
-    std::jthread mThread; ///< none where nothing is shown
+    std::jthread mThread; ///< null where nothing is shown
 };
 
 } // namespace tool

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a property holds, whatever its type is.
+// The value of a property of any type.
 #pragma once
 
 #include <string>

@@ -36,7 +36,7 @@ std::vector<FbxObject*> chosenObjects(FbxScene& scene, const std::string& name) 
     return chosen;
 }
 
-/// What is connected to the property beside the curves that drive it.
+/// The property's connections other than the curves that drive it.
 std::vector<std::string> sourcesOf(const FbxProperty& property) {
     std::vector<std::string> names;
     for (int i = 0; i < property.GetSrcObjectCount(); ++i) {

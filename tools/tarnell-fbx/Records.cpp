@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx records: a file as the records that it is made of, with the place of each.
+// tarnell-fbx records: the records of a file, with the place of each.
 #include <algorithm>
 #include <memory>
 #include <string_view>
@@ -23,7 +23,7 @@ using extensions::FileRecord;
 using extensions::RecordFile;
 using extensions::RecordValue;
 
-constexpr std::size_t kLongestText = 100; ///< columns of a text value on a page for people
+constexpr std::size_t kLongestText = 100; ///< columns of a text value on a text page
 
 std::vector<std::string> pathParts(const std::string& path) {
     std::vector<std::string> parts;
@@ -80,7 +80,7 @@ public:
     RecordPage(RecordFile& file, const RecordsOptions& options)
         : mFile(file), mOptions(options), mPath(pathParts(options.path)) {}
 
-    /// Whether anything stands under the path that was asked for.
+    /// Whether there is any record at the requested path.
     [[nodiscard]] bool any() const { return mPath.empty() || finds(mFile.first(), 0); }
 
     void printText(Page& page) {
@@ -105,7 +105,7 @@ public:
     }
 
 private:
-    /// Whether the record is on the way to what was asked for, or below it.
+    /// Whether the record is an ancestor of the requested one, or below it.
     [[nodiscard]] bool isOnPath(const FileRecord& record, std::size_t level) const {
         return level >= mPath.size() || record.name() == mPath[level];
     }
@@ -126,7 +126,7 @@ private:
         return static_cast<std::size_t>(most == 0 ? count : std::min(count, most));
     }
 
-    // For people. Levels are bounded by the reader of the file.
+    // Text output. The reader of the file limits the number of levels.
 
     void printTexts(FileRecord record, std::size_t level, std::ostream& out) {
         for (; record; record = record.nextSibling()) {
@@ -191,7 +191,7 @@ private:
         return text;
     }
 
-    // For programs.
+    // JSON output.
 
     void printObjects(FileRecord record, std::size_t level, JsonWriter& json) {
         for (; record; record = record.nextSibling()) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx report: files as one page for a browser, which needs nothing but itself.
+// tarnell-fbx report: files as one self-contained page for a browser.
 #include <algorithm>
 #include <filesystem>
 #include <fstream>
@@ -19,7 +19,7 @@ namespace {
 
 namespace filesystem = std::filesystem;
 
-/// Why the page may not be written; empty when it may. A page of ours makes room for a new one.
+/// Why the page must not be written; empty when it may. An existing report is replaced.
 std::string refusal(const ReportOptions& options, const std::vector<std::string>& files) {
     std::error_code ignored;
     for (const std::string& file : files) {
@@ -33,12 +33,12 @@ std::string refusal(const ReportOptions& options, const std::vector<std::string>
     return start == ReportPage::mark() ? "" : "exists and is no report; --force overwrites it";
 }
 
-/// A file that appears under its name when all of it is there, or not at all.
+/// A file that appears under its name when it is complete, or not at all.
 class PageFile {
 public:
     explicit PageFile(const std::string& name) : mName(name), mPart(name + ".part") {
         std::error_code ignored;
-        while (filesystem::exists(mPart, ignored)) // it may be anybody's
+        while (filesystem::exists(mPart, ignored)) // it may belong to another program
             mPart += '~';
         mStream.open(mPart, std::ios::binary | std::ios::trunc);
         if (!mStream)

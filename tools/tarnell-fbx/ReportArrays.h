@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// The numbers of a report that are many: typed arrays, one behind the other, which its page carries as one text.
 #pragma once
 
 #include <cstddef>
@@ -13,9 +11,10 @@
 
 namespace tool {
 
+/// The large numeric data of a report: typed arrays, one after the other, which its page holds as one text.
 class ReportArrays {
 public:
-    /// Where an array begins, in bytes; a multiple of four, as browsers ask of arrays of floats.
+    /// The offset of an array in bytes; a multiple of four, as browsers require for arrays of floats.
     template <class Number>
     std::size_t add(const std::vector<Number>& numbers) {
         const std::size_t at = mBytes.size();

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The document of one file in a report. docs/report.md says what stands in it.
+// The document of one file in a report, described in docs/report.md.
 #include <algorithm>
 #include <array>
 
@@ -63,7 +63,7 @@ public:
         mJson.endArray();
     }
 
-    /// What `lint` finds, rule by rule.
+    /// The findings of `lint`, rule by rule.
     void findings(const std::vector<Finding>& findings) {
         mJson.key("findings");
         mJson.beginArray();
@@ -137,7 +137,7 @@ private:
     }
 
     void channels(TnFbxCamera& camera) {
-        // The names of the library are misspelt for good.
+        // The library's names are misspelt deliberately.
         constexpr struct {
             const char* name;
             TnFbxCamera::EFbxCameraChannelType type;
@@ -164,7 +164,7 @@ private:
             channel(kNames[i], *light.getLightChannel(static_cast<TnFbxLight::EFbxLightChannelType>(i)));
     }
 
-    /// A number, or where the array of the frames' numbers begins.
+    /// A number, or the offset of the array of the frames' numbers.
     void channel(const char* name, const TnFbxChannel& channel) {
         mJson.key(name);
         if (!channel.getAnimated()) {
@@ -181,7 +181,7 @@ private:
         mJson.endObject();
     }
 
-    /// What `camera` says beside the channels.
+    /// The data of `camera` besides the channels.
     void print(const TnFbxCamera& camera, const FbxNode& node) {
         mJson.key("camera");
         mJson.beginObject();

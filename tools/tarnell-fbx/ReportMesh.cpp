@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Triangles of polygons by cutting off ears, and fewer triangles by merging the points of each cell of a grid.
+// Triangulation of polygons by ear clipping, and decimation by merging the points of each cell of a grid.
 #include "ReportMesh.h"
 
 #include <algorithm>
@@ -24,15 +24,15 @@ bool isFinite(const Point& point) {
 struct Corner {
     double x, y;
     std::uint32_t point;
-    std::uint32_t before, after; ///< its neighbours among those that are left
+    std::uint32_t before, after; ///< the adjacent ones among the remaining ones
 };
 
-/// Twice the area of the triangle; positive when it goes round against the clock.
+/// Twice the area of the triangle; positive when it is counter-clockwise.
 double turn(const Corner& a, const Corner& b, const Corner& c) {
     return (b.x - a.x) * (c.y - a.y) - (b.y - a.y) * (c.x - a.x);
 }
 
-/// The polygon as seen along its normal, going round against the clock.
+/// The polygon seen along its normal, counter-clockwise.
 std::vector<Corner> flattened(const std::vector<std::uint32_t>& polygon, const std::vector<Point>& points) {
     std::array<double, 3> normal{};
     for (std::size_t i = 0; i < polygon.size(); ++i) {
@@ -43,7 +43,7 @@ std::vector<Corner> flattened(const std::vector<std::uint32_t>& polygon, const s
             normal[k] += (static_cast<double>(a[u]) - b[u]) * (static_cast<double>(a[v]) + b[v]);
         }
     }
-    std::size_t axis = 0; // that the polygon faces most; the other two are its plane
+    std::size_t axis = 0; // the dominant axis of the normal; the other two are its plane
     for (std::size_t k = 1; k < 3; ++k)
         axis = std::abs(normal[k]) > std::abs(normal[axis]) ? k : axis;
     const std::size_t u = (axis + 1) % 3, v = (axis + 2) % 3;
@@ -58,7 +58,7 @@ std::vector<Corner> flattened(const std::vector<std::uint32_t>& polygon, const s
     return corners;
 }
 
-/// Corners at which a polygon turns inwards, by their places: nothing else can lie in an ear.
+/// The reflex corners of a polygon, by their places: no others can lie in an ear.
 class InwardCorners {
 public:
     explicit InwardCorners(const std::vector<Corner>& corners) : mCorners(corners) {
@@ -99,7 +99,7 @@ private:
 
     [[nodiscard]] bool isIn(std::uint32_t i, const Corner& a, const Corner& b, const Corner& c, bool withinOnly) const {
         const Corner& p = mCorners[i];
-        if (p.before == i || p.point == a.point || p.point == b.point || p.point == c.point) // cut off, or one of them
+        if (p.before == i || p.point == a.point || p.point == b.point || p.point == c.point) // removed, or one of them
             return false;
         const double least = std::min({turn(a, b, p), turn(b, c, p), turn(c, a, p)});
         return withinOnly ? least > 0.0 : least >= 0.0;
@@ -111,7 +111,7 @@ private:
     std::vector<std::vector<std::uint32_t>> mCells;
 };
 
-/// Takes a corner out of the polygon; one that names itself is gone.
+/// Removes a corner from the polygon; a removed one refers to itself.
 std::uint32_t remove(std::vector<Corner>& corners, std::uint32_t i) {
     const auto [before, after] = std::pair(corners[i].before, corners[i].after);
     corners[before].after = after;
@@ -122,7 +122,7 @@ std::uint32_t remove(std::vector<Corner>& corners, std::uint32_t i) {
 
 void cutEars(std::vector<Corner> corners, std::vector<Triangle>& triangles) {
     const InwardCorners inward(corners);
-    // Polygons that touch or cross themselves have no clear ears at some point: then one that others touch will do, and
+    // Polygons that touch or cross themselves may have no strict ear: then one that others touch is used, and
     // at last any corner.
     enum { clear, touched, any } wanted = clear;
     std::uint32_t i = 0;
@@ -133,7 +133,7 @@ void cutEars(std::vector<Corner> corners, std::vector<Triangle>& triangles) {
         const Corner& c = corners[b.after];
         const double area = turn(a, b, c);
         const bool isEar = area > 0.0 && !inward.anyIn(a, b, c, wanted == touched);
-        if (isEar || area == 0.0 || wanted == any) { // a corner on a straight line goes without a triangle
+        if (isEar || area == 0.0 || wanted == any) { // a corner on a straight line is removed without a triangle
             if (area != 0.0)
                 triangles.push_back({a.point, b.point, c.point});
             i = remove(corners, i);
@@ -159,7 +159,7 @@ void cut(const std::vector<std::uint32_t>& polygon, const std::vector<Point>& po
         cutEars(flattened(polygon, points), triangles);
 }
 
-/// Names the points that triangles use in the order of their numbers, and has the triangles name places among them.
+/// Lists the points that triangles use in the order of their numbers, and makes the triangles refer to that list.
 void keepUsedPoints(ReportMesh& mesh, const std::vector<std::uint32_t>& numbers) {
     constexpr std::uint32_t kUnused = std::numeric_limits<std::uint32_t>::max();
     std::vector<std::uint32_t> places(numbers.size(), kUnused), kept;
@@ -197,7 +197,7 @@ public:
             mLength = std::max(mLength, high[k] - mLow[k]);
     }
 
-    /// The triangles that are left when the first point of each cell stands for all of them.
+    /// The remaining triangles when the first point of each cell replaces all of them.
     [[nodiscard]] std::vector<Triangle> merged(std::uint32_t size) const {
         std::unordered_map<std::uint64_t, std::uint32_t> first;
         std::vector<std::uint32_t> stands(mMesh.kept.size());
@@ -249,7 +249,7 @@ ReportMesh triangulated(const TnFbxMesh& mesh) {
         polygon.clear();
         for (int k = 0; k < size; ++k, ++corner) {
             const auto point =
-                static_cast<std::size_t>(mesh.getPointIndex(corner)); // negative ones become far too large
+                static_cast<std::size_t>(mesh.getPointIndex(corner)); // negative ones become much too large
             if (point < points.size() && isFinite(points[point]))
                 polygon.push_back(static_cast<std::uint32_t>(point));
         }
@@ -270,7 +270,7 @@ void thin(ReportMesh& mesh, const std::vector<Point>& points, std::size_t mostTr
     if (mesh.triangles.size() <= mostTriangles)
         return;
     const Grid grid(mesh, points);
-    // The finest grid that leaves few enough, to an eighth or so.
+    // The finest grid with few enough triangles, within about an eighth.
     constexpr std::uint32_t kFinest = 1U << 14U;
     std::uint32_t fits = 1, tooFine = kFinest;
     std::vector<Triangle> best;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes as a report draws them: triangles, and no more of them than a page can carry.
+// Meshes for drawing in a report: triangles, limited to what a page can hold.
 #pragma once
 
 #include <array>
@@ -15,14 +15,14 @@ namespace tool {
 
 using Point = std::array<float, 3>;
 
-/// A mesh in triangles. `kept` are the numbers of the control points that are drawn, and triangles name places in it.
+/// A mesh in triangles. `kept` are the numbers of the control points that are drawn, and triangles are indices into it.
 struct ReportMesh {
     std::vector<std::uint32_t> kept;
     std::vector<std::array<std::uint32_t, 3>> triangles;
-    std::size_t triangleCount = 0; ///< before thinning
+    std::size_t triangleCount = 0; ///< before decimation
     std::size_t polygonCount = 0;
     std::size_t pointCount = 0;
-    int droppedPolygons = 0; ///< that name points there are not, or points that are nowhere
+    int droppedPolygons = 0; ///< with missing points, or points that are not finite
 
     [[nodiscard]] bool isThinned() const { return triangles.size() < triangleCount; }
 };
@@ -30,7 +30,7 @@ struct ReportMesh {
 /// Polygons may be concave.
 ReportMesh triangulated(const Tarnell::Fbx::TnFbxMesh& mesh);
 
-/// Makes one point of those that are close to each other, until no more triangles than that are left.
+/// Merges points that are close to each other, until no more triangles than that are left.
 void thin(ReportMesh& mesh, const std::vector<Point>& points, std::size_t mostTriangles);
 
 /// The first set of control points.

@@ -14,7 +14,7 @@ void put(std::ostream& out, std::span<const std::string_view> pieces) {
         out << piece;
 }
 
-/// JSON as it may stand in HTML: nothing in it ends the element that holds it. "<" stands in texts only.
+/// JSON escaped for HTML: nothing in it ends the element that holds it. "<" occurs in texts only.
 std::string withoutMarkup(const std::string& json) {
     std::string text;
     text.reserve(json.size());

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The page of a report: what the build made of tools/report, with the data of files in its middle.
+// The page of a report: the build output of tools/report, with the data of files inserted.
 #pragma once
 
 #include <ostream>
@@ -13,7 +13,7 @@
 
 namespace tool {
 
-/// The document of one file; its long arrays go to `arrays`, and the document says where.
+/// The document of one file; its long arrays are added to `arrays`, and the document has their offsets.
 void printReport(const std::string& file, const ReportScene& scene, ReportArrays& arrays, JsonWriter& json);
 
 /// Writes a page: begin, then for each file its document and its arrays, then end.
@@ -24,7 +24,7 @@ public:
     void addFile(const std::string& document, const ReportArrays& arrays);
     void end();
 
-    /// What every page of ours begins with.
+    /// The first bytes of every report page.
     static std::string_view mark();
 
 private:

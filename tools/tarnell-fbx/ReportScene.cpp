@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Reading for a report. Values come from the faithful facade, one call for each kind; the tree and what no value object
-// has a place for come from the platform.
+// Reading for a report. Values come from the faithful facade, one call for each kind; the tree and data that no value
+// object can hold come from the platform.
 #include "ReportScene.h"
 
 #include <algorithm>
@@ -22,14 +22,14 @@ using namespace Tarnell::Fbx;
 
 namespace {
 
-/// A browser opens pages of this many numbers at once, and turns their scenes without a jerk.
+/// A browser opens pages of this many numbers at once, and rotates their scenes smoothly.
 constexpr std::size_t kMostSamples = 3'000'000;
 constexpr int kMostFrames = 100'000;
 constexpr std::size_t kMostTriangles = 250'000;
 constexpr std::size_t kMostMovingPoints = 600'000;
 /// Transforms of nodes that are evaluated for one kind of object: a few seconds.
 constexpr double kMostEvaluations = 4e6;
-/// Every moment of moving points reads the file once more.
+/// Every sampled time of deforming points reads the file once more.
 constexpr int kMostMoments = 250;
 constexpr std::uintmax_t kMostBytesReadAgain = std::uintmax_t{256} << 20U;
 
@@ -67,14 +67,14 @@ std::string counted(std::size_t count, const char* one, const char* many) {
     return std::to_string(count) + ' ' + (count == 1 ? one : many);
 }
 
-/// The least power of two from a number on: parts of a frame, and of most rates, by one are exact, and so the moment of
+/// The smallest power of two from a number on: dividing a frame, and most rates, by one is exact, and so the time of
 /// a frame is the same at each of these rates.
 int powerOfTwoFrom(int number) {
     return static_cast<int>(std::bit_ceil(static_cast<unsigned>(std::clamp(number, 1, 1 << 30))));
 }
 bool isExact(double rate) { return static_cast<double>(static_cast<float>(rate)) == rate; }
 
-/// So many places among `count`, evenly spread, the first and the last among them.
+/// That many indices below `count`, evenly spread, including the first and the last.
 std::vector<int> spread(int wanted, int count) {
     std::vector<int> places;
     places.reserve(static_cast<std::size_t>(wanted));
@@ -125,7 +125,7 @@ void ReportScene::chooseFrames(const ReportWishes& wishes) {
     mSampleStep = powerOfTwoFrom(static_cast<int>(std::min(std::ceil(mFrames.count * nodes / kMostEvaluations), 1e9)));
 }
 
-/// Picks frames among those that were read: the ones that were wished for, and no more than a page can carry.
+/// Selects frames among those that were read: the requested ones, limited to what a page can hold.
 void ReportScene::boundFrames(const ReportWishes& wishes) {
     std::size_t moving = 0;
     int first = mFrames.first, last = first + mFrames.count - 1;
@@ -182,7 +182,7 @@ void ReportScene::readEvery(int step, int frame) {
     mInfo.setFrame(static_cast<float>(frame) / static_cast<float>(step));
 }
 
-/// The next object of a kind, which is what the node carries.
+/// The next object of a kind, which belongs to the node.
 template <class Object>
 Object* ReportScene::next(Objects<Object>& objects, const FbxNode& node) {
     if (objects.next == objects.count || objects.array.get()[objects.next].getName() != node.GetName())
@@ -228,7 +228,7 @@ const CameraFacts* ReportScene::factsOf(const FbxNode& node) const {
     return found == mCameraFacts.end() ? nullptr : &found->second;
 }
 
-/// Triangles, as many of each mesh as it has of all.
+/// Triangles, a share for each mesh in proportion to its own.
 void ReportScene::thinShapes(const Objects<TnFbxMesh>& meshes) {
     std::size_t triangles = 0, thinned = 0;
     int dropped = 0;

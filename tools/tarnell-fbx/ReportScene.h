@@ -1,8 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// What a report shows of one file: faithful values of all its nodes, frame by frame, and as many numbers as a page can
-// carry.
 #pragma once
 
 #include <memory>
@@ -26,7 +23,7 @@
 
 namespace tool {
 
-/// The frames that a report has values of: first, first + step, … in whole frames of the file's rate.
+/// The frames of a report's values: first, first + step, … in whole frames of the file's rate.
 struct ReportFrames {
     double rate = 24.0;
     int first = 0;
@@ -35,7 +32,7 @@ struct ReportFrames {
     [[nodiscard]] int at(int index) const { return first + index * step; }
 };
 
-/// One node and what it carries, if that is drawn.
+/// One node and its attribute, if that is drawn.
 struct ReportNode {
     TreeNode tree;
     Tarnell::Fbx::TnFbxTransform* transform = nullptr; ///< of cameras and lights, their own: they look along -Z
@@ -45,7 +42,7 @@ struct ReportNode {
     int mesh = -1; ///< index of the mesh
 };
 
-/// A mesh in the space of its node. Points that stand still have one set; others one for each of the shape frames.
+/// A mesh in the space of its node. Static points have one set; others one for each of the shape frames.
 struct ReportShape {
     ReportMesh mesh;
     std::vector<std::vector<Point>> sets;
@@ -56,6 +53,8 @@ struct ReportWishes {
     std::optional<std::pair<int, int>> frames; ///< only these
 };
 
+/// The data of a report about one file: faithful values of all its nodes, frame by frame, limited to what a page can
+/// hold.
 class ReportScene {
 public:
     /// Throws Unreadable.
@@ -63,18 +62,18 @@ public:
 
     [[nodiscard]] const SceneFile& opened() const { return mOpened; }
     [[nodiscard]] const std::string& take() const { return mTake; }
-    /// What is said of a camera; null where that could not be gathered.
+    /// The facts of a camera; null where they could not be read.
     [[nodiscard]] const CameraFacts* factsOf(const FbxNode& node) const;
     [[nodiscard]] const ReportFrames& frames() const { return mFrames; }
-    /// Frames of the file's rate between two that channels have samples of.
+    /// The number of frames of the file's rate between two samples.
     [[nodiscard]] int sampleStep() const { return mSampleStep; }
     [[nodiscard]] const std::vector<ReportNode>& nodes() const { return mNodes; }
     [[nodiscard]] const std::vector<ReportShape>& shapes() const { return mShapes; }
-    /// The places among the frames at which points that move were read.
+    /// The indices of the frames at which deforming points were read.
     [[nodiscard]] const std::vector<int>& shapeFrames() const { return mShapeFrames; }
-    /// What the library noticed while it read.
+    /// The library's warnings while reading.
     [[nodiscard]] const std::vector<std::string>& warnings() const { return mWarnings; }
-    /// What the report leaves out, sentences for people.
+    /// What the report leaves out, one sentence each.
     [[nodiscard]] const std::vector<std::string>& notes() const { return mNotes; }
 
 private:
@@ -90,9 +89,9 @@ private:
     void boundFrames(const ReportWishes& wishes);
     template <class Object>
     Objects<Object> read(Reader<Object> reader);
-    /// Options that sample every so-manyth frame, and read static values and meshes at a frame.
+    /// Options that sample every n-th frame, and read static values and meshes at a frame.
     void readEvery(int step, int frame);
-    /// Options that read at one moment and, where that can be done exactly, sample next to nothing.
+    /// Options that read at one time and, where that is exact, sample almost nothing.
     void readOneMoment(int frame);
     template <class Object>
     Object* next(Objects<Object>& objects, const FbxNode& node);
@@ -118,7 +117,7 @@ private:
     std::vector<ReportShape> mShapes;
     std::vector<int> mShapeFrames;
     std::vector<std::string> mWarnings, mNotes;
-    std::set<std::string> mKnownWarnings; ///< each kind of object brings those of the file again
+    std::set<std::string> mKnownWarnings; ///< each kind of object repeats those of the file
 };
 
 } // namespace tool

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The page that the build makes of tools/report, before and behind the place of the data. In pieces, since compilers
-// take texts of a moderate length only.
+// The build output of tools/report, before and after the place of the data. In parts, since compilers
+// limit the length of string literals.
 #pragma once
 
 #include <span>

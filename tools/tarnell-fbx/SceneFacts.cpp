@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Words for what a scene says in numbers.
+// Text for the numbers of a scene.
 #include "SceneFacts.h"
 
 #include <charconv>
@@ -26,7 +26,7 @@ namespace {
 
 template <class Real>
 std::string shortest(Real value) {
-    // Shortest alone would have 100000 as 1e+05.
+    // The shortest form by itself would give 100000 as 1e+05.
     constexpr double kSmall = 1e-5, kLarge = 1e15;
     const double size = std::abs(static_cast<double>(value));
     const bool isUsual = (size >= kSmall && size < kLarge) || size == 0.0;

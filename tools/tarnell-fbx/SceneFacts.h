@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Words for what a scene says in numbers, the same in every command.
+// Text for the numbers of a scene, the same in every command.
 #pragma once
 
 #include <cstdint>
@@ -12,7 +12,7 @@
 
 namespace tool {
 
-/// At most ten significant digits, none of them useless.
+/// At most ten significant digits, without trailing zeros.
 std::string numberText(double value);
 /// "23.976 frames per second", to four decimals.
 std::string rateText(double framesPerSecond);
@@ -21,7 +21,7 @@ std::string exactText(double value);
 std::string exactText(float value);
 /// "512 bytes", "24.3 KiB", "1.5 MiB".
 std::string sizeText(std::uintmax_t bytes);
-/// A name for a person: in quotes, on one line, without control characters.
+/// A name for display: in quotes, on one line, without control characters.
 std::string inQuotes(std::string_view name);
 
 /// "metre", or the number of centimetres.
@@ -33,7 +33,7 @@ struct Axes {
 };
 Axes axesOf(const FbxAxisSystem& system);
 
-/// What a node is, by its attribute: "mesh", "camera", "null"; "node" when it has none.
+/// The kind of a node, by its attribute: "mesh", "camera", "null"; "node" when it has none.
 const char* kindOf(const FbxNode& node);
 
 } // namespace tool

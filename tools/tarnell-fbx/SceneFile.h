@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// A file as the commands that look into it have it: the scene, before any conversion, and the facts of the file itself.
 #pragma once
 
 #include <memory>
@@ -12,12 +10,13 @@
 
 namespace tool {
 
-/// Why a file cannot be shown. The sentence may begin with the file's name.
+/// Why a file cannot be shown. The message may begin with the file's name.
 class Unreadable : public std::runtime_error {
 public:
     using std::runtime_error::runtime_error;
 };
 
+/// A file as the inspecting commands use it: the scene, before any conversion, and the facts of the file itself.
 class SceneFile {
 public:
     /// Throws Unreadable.
@@ -30,11 +29,11 @@ public:
     /// application says 23.976.
     [[nodiscard]] double frameRate() const;
 
-    /// Whether the file names its objects by numbers, as files from 7.0 on do.
+    /// Whether the file identifies its objects by numbers, as files from 7.0 on do.
     [[nodiscard]] bool hasIds() const { return mImporter->GetFileHeaderInfo()->mFileVersion >= 7000; }
 
-    /// Makes the stack of that name the one that is evaluated; an empty name means the first. Null when the file has
-    /// none. Throws Unreadable, with the names that there are, when there is none of that name.
+    /// Selects the stack of that name for evaluation; an empty name means the first. Null when the file has
+    /// none. Throws Unreadable, with the existing names, when there is none of that name.
     FbxAnimStack* chooseTake(const std::string& name) const;
 
 private:

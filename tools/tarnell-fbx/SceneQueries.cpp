@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Finding things in a scene.
+// Queries to a scene.
 #include "SceneQueries.h"
 
 #include <algorithm>
@@ -13,7 +13,7 @@
 namespace tool {
 namespace {
 
-/// Appends a node and everything below it, without recursion: trees may be as deep as they like.
+/// Appends a node and all descendants, without recursion: trees may have any depth.
 void appendTree(TreeNode top, std::vector<TreeNode>& nodes) {
     std::vector<TreeNode> pending{top};
     while (!pending.empty()) {

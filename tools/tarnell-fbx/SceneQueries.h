@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Finding things in a scene.
+// Queries to a scene.
 #pragma once
 
 #include <string>
@@ -13,34 +13,34 @@
 
 namespace tool {
 
-/// A node of the tree. Nodes that hang nowhere are at depth 0, like the children of the root.
+/// A node of the tree. Unparented nodes are at depth 0, like the children of the root.
 struct TreeNode {
     FbxNode* node;
     int parent; ///< index in the list; -1 at depth 0
     int depth;
     bool isLast;     ///< of its parent's children
-    bool isDetached; ///< hangs nowhere
+    bool isDetached; ///< unparented
 };
 
-/// All nodes but the root, parents before children, children in their order; what hangs nowhere comes last.
+/// All nodes but the root, parents before children, children in their order; unparented ones come last.
 std::vector<TreeNode> nodesInOrder(FbxScene& scene);
 
 /// Whether any curve of any take drives the property.
 bool isAnimated(const FbxProperty& property);
 
-/// Whether a faithful write made the node only to skew the one below it, as it does wherever that is written again.
+/// Whether a faithful write created the node only to skew the one below it, as it does on every write.
 bool isSkewHelper(const FbxNode& node);
 
-/// The object's properties in their order, those of compounds behind the compound.
+/// The object's properties in their order, those of compounds after the compound.
 std::vector<FbxProperty> propertiesOf(const FbxObject& object);
 
-/// The scene's objects of that name: nodes first, then what is no node.
+/// The scene's objects of that name: nodes first, then the others.
 std::vector<FbxObject*> objectsNamed(FbxScene& scene, const std::string& name);
 
-/// The class without the prefix that all classes have: "Node", "Camera", "AnimLayer".
+/// The class without the common prefix of all classes: "Node", "Camera", "AnimLayer".
 std::string className(const FbxObject& object);
 
-/// That there is no object of the name, and what may have been meant.
+/// The message that there is no object of the name, with similar names.
 std::string unknownObject(FbxScene& scene, const std::string& name);
 
 /// The key "id": the object's number in the file, null where files name objects otherwise.

@@ -42,7 +42,7 @@ void Page::json(std::string_view command, const std::function<void(JsonWriter&)>
 
 namespace {
 
-/// What several pages stand between, and what stands between two of them.
+/// The text before, after and between several pages.
 struct Frame {
     std::string_view before, between, after;
 };
@@ -109,7 +109,7 @@ private:
                           : "reading " + mFiles[index]);
     }
 
-    /// A page follows: where people see pages and progress on one terminal, the line makes room.
+    /// Before a page: where pages and progress are on one terminal, the progress line is removed.
     void beginPage() {
         if (mOutputIsShown)
             mProgress.hide();
@@ -155,7 +155,7 @@ private:
         return result;
     }
 
-    /// The next file, once those before it have been printed up to a few: pages that wait take memory.
+    /// The next file, once all but a few of those before it have been printed: waiting pages take memory.
     bool takeFile(const std::stop_token& stop, std::size_t& index) {
         std::unique_lock lock(mMutex);
         index = mNext++;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// One command, many files: what every command that looks into files does around its own work.
+// One command, many files: the common part of all commands that inspect files.
 #pragma once
 
 #include <functional>
@@ -15,7 +15,7 @@
 
 namespace tool {
 
-/// What is printed about one file.
+/// The output for one file.
 class Page {
 public:
     /// `beforeBegin` is called before anything is printed.
@@ -28,10 +28,10 @@ public:
     [[nodiscard]] bool isJson() const { return mForm == Form::json || mForm == Form::jsonLines; }
     [[nodiscard]] const Terminal& terminal() const { return mTerminal; }
 
-    /// The stream, once it is certain that the file can be read. From here on nothing should fail any more.
+    /// The stream, once it is certain that the file can be read. From here on nothing should fail.
     std::ostream& begin();
-    /// Prints a JSON object that begins with the keys that all have: the format's name, the file's name, and then what
-    /// `content` adds.
+    /// Prints a JSON object that begins with the common keys: the format's name, the file's name, and then those
+    /// that `content` adds.
     void json(std::string_view command, const std::function<void(JsonWriter&)>& content);
     [[nodiscard]] bool begun() const { return mBegun; }
 
@@ -44,12 +44,12 @@ private:
     bool mBegun = false;
 };
 
-/// Prints a page; throws Unreadable, before it begins, when there is none. Hands out an exit status. Several run at the
-/// same time when the user asks for it.
+/// Prints a page; throws Unreadable, before it begins, when there is none. Returns an exit status. Several run at the
+/// same time when the user requests it.
 using Show = std::function<int(Page&)>;
 
 /// Shows all files in their order. A file that fails does not keep the others from being shown; the status is that of
-/// the worst. As JSON, several files are an array, or a line each, and the place of a file that failed says why.
+/// the worst. As JSON, several files are an array, or a line each, and a file that failed has an entry with the reason.
 int showFiles(const LookOptions& options, std::string_view command, const Show& show);
 
 } // namespace tool

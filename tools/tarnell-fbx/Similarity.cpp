@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Similar names, by the number of letters to insert, leave out, replace or swap with the next one.
+// Similar names, by the number of letters to insert, delete, replace or swap with the next one.
 #include "Similarity.h"
 
 #include <algorithm>
@@ -40,7 +40,7 @@ std::size_t editDistance(std::string_view a, std::string_view b) {
     return row.back();
 }
 
-/// Smaller is more similar; none when the two have nothing to do with each other.
+/// Smaller is more similar; none when the two are unrelated.
 constexpr std::size_t kUnrelated = 1000;
 std::size_t difference(const std::string& text, const std::string& name) {
     if (name.size() > kLongest || name.empty())

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What somebody who mistyped a name may have meant.
+// Suggestions for mistyped names.
 #pragma once
 
 #include <string>

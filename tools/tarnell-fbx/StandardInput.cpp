@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A pipe can be read once, and a command opens its file several times.
+// A pipe can be read only once, while a command opens its file several times.
 #include "StandardInput.h"
 
 #include <array>
@@ -29,7 +29,7 @@ std::string& keptName() {
     throw std::runtime_error(std::string(kSpoken) + ": cannot be read: " + std::generic_category().message(error));
 }
 
-/// Repeats what a signal interrupted.
+/// Repeats a call interrupted by a signal.
 template <class Call>
 std::size_t transfer(const Call& call) {
     ssize_t count = -1;

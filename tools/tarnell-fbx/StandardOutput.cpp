@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Writing to a descriptor, all of it or with the reason.
+// Writes everything to a descriptor, or reports the reason.
 #include "StandardOutput.h"
 
 #include <cerrno>
@@ -20,7 +20,7 @@ CheckedOutput::CheckedOutput(std::ostream& stream, int descriptor)
     // Standard error would flush the stream before it prints: on whatever thread that happens, and once more when
     // standard output has failed.
     std::cerr.tie(nullptr);
-    // What writing throws comes through the stream only when the stream itself would throw.
+    // Exceptions of writing pass the stream only when the stream itself is set to throw.
     mStream.exceptions(std::ios::badbit);
 }
 
@@ -55,7 +55,7 @@ void CheckedOutput::writeAll() {
             continue;
         if (written < 0) {
             const int reason = errno;
-            setp(mBuffer.data(), mBuffer.data() + mBuffer.size()); // it is lost: nobody shall try it again
+            setp(mBuffer.data(), mBuffer.data() + mBuffer.size()); // it is lost: it must not be tried again
             throw OutputFailure(reason);
         }
         next += written;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Standard output that is never lost silently: when it cannot be written, work ends and somebody hears why.
+// Standard output that is never lost silently: when it cannot be written, work ends and the reason is reported.
 #pragma once
 
 #include <array>
@@ -11,19 +11,19 @@
 
 namespace tool {
 
-/// Thrown out of whatever was printing. No std::exception: it is no fault of the file that is being read.
+/// Thrown by failed output. Not a std::exception: it is not a fault of the file that is being read.
 class OutputFailure {
 public:
     explicit OutputFailure(int systemError) : mSystemError(systemError) {}
     [[nodiscard]] int systemError() const { return mSystemError; }
-    /// The reader left, as `head` does when it has seen enough. Nobody needs to hear of it.
+    /// The reader closed the pipe, as `head` does. No message is needed.
     [[nodiscard]] bool readerLeft() const;
 
 private:
     int mSystemError;
 };
 
-/// While it lives, a stream writes to a file descriptor through it, and throws OutputFailure where that fails.
+/// For its lifetime, a stream writes to a file descriptor through it, and throws OutputFailure where that fails.
 class CheckedOutput : public std::streambuf {
 public:
     CheckedOutput(std::ostream& stream, int descriptor);
@@ -31,7 +31,7 @@ public:
     CheckedOutput(const CheckedOutput&) = delete;
     CheckedOutput& operator=(const CheckedOutput&) = delete;
 
-    /// Writes what is left. Throws OutputFailure.
+    /// Writes the rest. Throws OutputFailure.
     void finish();
 
 protected:

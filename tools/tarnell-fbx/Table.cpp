@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Tables.
 #include "Table.h"
 
 #include <algorithm>
@@ -30,7 +28,7 @@ void Table::print(std::ostream& out, const Terminal& terminal, std::size_t inden
             const std::string text = i + 1 == cells.size() ? terminal.fit(cells[i], taken) : cells[i];
             const std::string padding(width[i] - std::min(width[i], displayWidth(text)), ' ');
             const bool toTheRight = mColumns[i].align == Align::right;
-            // Blanks are held back until something follows them.
+            // Blanks are written only when something follows them.
             line += text.empty() ? "" : blanks + (toTheRight ? padding : "");
             if (!text.empty()) {
                 blanks.clear();

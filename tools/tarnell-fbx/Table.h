@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Tables for people: columns as wide as their widest cell, numbers to the right.
 #pragma once
 
 #include <ostream>
@@ -12,6 +10,7 @@
 
 namespace tool {
 
+/// Text tables: columns as wide as their widest cell, numbers right-aligned.
 class Table {
 public:
     enum class Align { left, right };
@@ -26,7 +25,7 @@ public:
     /// One cell per column, without control characters.
     void addRow(std::vector<std::string> cells) { mRows.push_back(std::move(cells)); }
     [[nodiscard]] bool empty() const { return mRows.empty(); }
-    /// Prints titles and rows behind so many blanks; the last column is cut where the line ends.
+    /// Prints titles and rows indented by that many blanks; the last column is truncated at the end of the line.
     void print(std::ostream& out, const Terminal& terminal, std::size_t indent) const;
 
 private:

@@ -42,7 +42,7 @@ TakeFacts takeFacts(const SceneFile& file, FbxAnimStack* take) {
         return facts;
     const auto& one = facts.span ? *facts.span : *facts.keys;
     const auto& other = facts.keys ? *facts.keys : one;
-    // Files round the ticks of odd rates: what is that near to a whole frame is that frame.
+    // Files round the ticks of fractional rates: a time that close to a whole frame is that frame.
     constexpr double kTolerance = 0.01, kMost = 2147483647.0;
     const double first = std::floor(std::min(one.first, other.first) * facts.frameRate + kTolerance);
     const double last = std::ceil(std::max(one.second, other.second) * facts.frameRate - kTolerance);

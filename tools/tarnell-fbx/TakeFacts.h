@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// What a file says of time: its rate, and the frames of a take, as a faithful read samples them.
 #pragma once
 
 #include <optional>
@@ -12,6 +10,7 @@
 
 namespace tool {
 
+/// The times of a file: its rate, and the frames of a take, as a faithful read samples them.
 struct TakeFacts {
     std::string name;                        ///< empty without a take
     bool exists = false;                     ///< whether the file has a take at all

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Colours and widths.
 #include "Terminal.h"
 
 #include <algorithm>

@@ -1,7 +1,5 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
-//
-// Text for terminals.
 #include "TerminalText.h"
 
 #include <unistd.h>
@@ -18,7 +16,7 @@ std::string hexadecimal(unsigned number, int digits) {
     return text;
 }
 
-/// Marks that turn the direction of what follows them, and separators of lines.
+/// Bidirectional marks, and separators of lines.
 bool isInvisibleControl(char32_t character) {
     return (character >= 0x80 && character < 0xA0) || character == 0x2028 || character == 0x2029 ||
            (character >= 0x202A && character <= 0x202E) || (character >= 0x2066 && character <= 0x2069);

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Text from files on its way to a terminal. Names may hold anything: what would move the cursor, change colours or turn
-// the direction of writing is spelt out instead.
+// Text from files for display in a terminal. Names may contain anything: characters that move the cursor, change
+// colours or the direction of writing are escaped.
 #pragma once
 
 #include <cstdio>
@@ -11,11 +11,11 @@
 
 namespace tool {
 
-/// The text on one line, without control characters: "\n", "\t", "\r", "\x1b", "\u202e". Bytes that are no UTF-8 are
-/// spelt out as well; everything else stays.
+/// The text on one line, without control characters: "\n", "\t", "\r", "\x1b", "\u202e". Invalid UTF-8 bytes are
+/// escaped as well; everything else stays.
 std::string terminalText(std::string_view text);
 
-/// Whether a person reads the stream.
+/// Whether the stream is a terminal.
 bool isTerminal(std::FILE* stream);
 
 } // namespace tool

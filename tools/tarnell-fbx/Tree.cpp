@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// tarnell-fbx tree: the nodes of a file as they hang below each other, and what is on each.
+// tarnell-fbx tree: the hierarchy of a file's nodes, and what is attached to each.
 #include <algorithm>
 #include <iterator>
 
@@ -17,13 +17,13 @@
 namespace tool {
 namespace {
 
-/// What is said of a node beside its name and kind.
+/// The data of a node besides its name and kind.
 struct NodeFacts {
     bool animated = false; ///< itself, or one of its attributes
     bool hidden = false;
-    const char* rotationOrder = "XYZ"; ///< the one in force
+    const char* rotationOrder = "XYZ"; ///< the effective one
     std::string target;
-    bool instance = false; ///< shares its attribute with a node before it
+    bool instance = false; ///< shares its attribute with an earlier node
     std::string attribute; ///< the attribute's own name, where it is not the node's
     std::vector<std::string> deformers;
     std::vector<std::string> materials;
@@ -78,7 +78,7 @@ NodeFacts factsOf(FbxNode& node) {
     return facts;
 }
 
-// ---- For people ----
+// ---- Text ----
 
 std::string remarks(const NodeFacts& facts) {
     std::string text;
@@ -117,7 +117,7 @@ public:
     }
 
 private:
-    std::vector<bool> mGoesOn; ///< per level: there are more nodes to come
+    std::vector<bool> mGoesOn; ///< per level: whether more nodes follow
 };
 
 int countBelow(const std::vector<TreeNode>& nodes, std::size_t index) {
@@ -156,7 +156,7 @@ void printText(const std::vector<TreeNode>& nodes, int depth, Page& page) {
         out << "  no nodes\n";
 }
 
-// ---- For programs ----
+// ---- JSON ----
 
 void printNames(const char* key, const std::vector<std::string>& names, JsonWriter& json) {
     json.key(key);

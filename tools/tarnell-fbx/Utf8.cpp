@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// UTF-8, as strictly as RFC 3629 has it: no overlong forms, no surrogates, nothing above U+10FFFF.
+// UTF-8, as strictly as in RFC 3629: no overlong forms, no surrogates, nothing above U+10FFFF.
 #include "Utf8.h"
 
 #include <algorithm>
@@ -18,7 +18,7 @@ bool isIn(const CodeRange* begin, const CodeRange* end, char32_t code) {
     return std::any_of(begin, end, [=](const CodeRange& range) { return code >= range.first && code <= range.last; });
 }
 
-/// The blocks that names are likely to come from; a table of all characters would be out of proportion.
+/// The blocks that names are likely to use; a table of all characters would be disproportionate.
 constexpr CodeRange kWide[] = {{0x1100, 0x115F},   {0x2E80, 0x303E},   {0x3041, 0x33FF},  {0x3400, 0x4DBF},
                                {0x4E00, 0x9FFF},   {0xA000, 0xA4CF},   {0xAC00, 0xD7A3},  {0xF900, 0xFAFF},
                                {0xFE30, 0xFE6F},   {0xFF00, 0xFF60},   {0xFFE0, 0xFFE6},  {0x1F300, 0x1F64F},
@@ -32,7 +32,7 @@ std::size_t columnsOf(char32_t code) {
     return isIn(std::begin(kWide), std::end(kWide), code) ? 2 : 1;
 }
 
-/// Bytes that a first byte announces; 0 when it begins no character.
+/// The number of bytes by the first byte; 0 when it begins no character.
 std::size_t announcedSize(unsigned char lead) {
     if (lead < 0x80)
         return 1;

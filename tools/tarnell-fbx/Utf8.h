@@ -19,10 +19,10 @@ struct Utf8Character {
 /// The character that begins at a byte of the text.
 Utf8Character utf8At(std::string_view text, std::size_t at);
 
-/// Columns of a terminal that the text takes: two for wide characters, none for those that combine.
+/// Columns of a terminal for the text: two for wide characters, none for combining ones.
 std::size_t displayWidth(std::string_view text);
 
-/// The text in at most so many columns; where it was cut, it ends in "…".
+/// The text in at most that many columns; a truncated one ends in "…".
 std::string fitted(std::string_view text, std::size_t columns);
 
 } // namespace tool

@@ -39,7 +39,7 @@ std::optional<Number> parse(std::string_view text) {
     return rest == end && error == std::errc() ? std::optional(number) : std::nullopt;
 }
 
-/// For options whose number the command line's own conversion would take as well when it is empty, NaN or infinite.
+/// For options with a number where the command line's own conversion also accepts empty text, NaN or infinity.
 std::string refuseUnlessFinite(const std::string& text) {
     const std::optional<float> number = parse<float>(text);
     return number && std::isfinite(*number) ? "" : "not a number: " + text;
@@ -47,7 +47,7 @@ std::string refuseUnlessFinite(const std::string& text) {
 
 std::vector<std::string> parseKinds(const std::string& text, const std::vector<std::string>& known) {
     std::vector<std::string> kinds;
-    for (std::size_t start = 0; start <= text.size();) { // also where nothing stands between or behind commas
+    for (std::size_t start = 0; start <= text.size();) { // also where nothing is between or after commas
         const std::size_t end = std::min(text.find(',', start), text.size());
         const std::string kind = text.substr(start, end - start);
         if (std::find(known.begin(), known.end(), kind) == known.end())
@@ -135,7 +135,7 @@ constexpr const char* kStatuses =
     "Exit status: 0 all is well; 1 something could not be read or written, or lint, diff or the check of a cache found "
     "something; 2 wrong usage; 3 done, but with --strict: not everything came over.\n";
 
-/// What the first word is, when it is no option; a command that there is not gets an answer of its own.
+/// The first word, when it is no option; an unknown command gets a message of its own.
 std::string unknownCommand(const CLI::App& app, const std::string& word) {
     std::vector<std::string> names{"help"};
     for (const CLI::App* command : app.get_subcommands([](const CLI::App*) { return true; }))
@@ -151,7 +151,7 @@ std::string unknownCommand(const CLI::App& app, const std::string& word) {
     return answer + (similar.empty() ? "; tarnell-fbx help lists them" : "?");
 }
 
-/// Prints the help of the tool, or of the command that the second word names.
+/// Prints the help of the tool, or of the command in the second word.
 int help(CLI::App& app, const std::string& command) {
     if (command.empty()) {
         std::cout << app.help();
@@ -166,7 +166,7 @@ int help(CLI::App& app, const std::string& command) {
     return tool::kSuccess;
 }
 
-/// Adds what the build asks for: it is no help to people.
+/// Adds the options for the build, which are not in the help.
 void addSources(CLI::App& app, std::function<int()>& chosen) {
     CLI::App* manual = app.add_subcommand("manual", "Print the manual page, for man")->group("");
     manual->callback([&app, &chosen] {
@@ -193,7 +193,7 @@ void addSources(CLI::App& app, std::function<int()>& chosen) {
         ->type_name("");
 }
 
-/// Where a file is called "-".
+/// The argument where a file is "-".
 void takeStandardInput(std::string& file) {
     if (file == "-")
         file = tool::keepStandardInput();
@@ -236,14 +236,14 @@ int run(int argc, char** argv) {
     return tool::guarded(dumpOptions.file, [&] { return tool::dump(dumpOptions); });
 }
 
-/// Runs, and sees to it that all of what was printed arrives.
+/// Runs, and ensures that all output is written.
 int runToTheEnd(int argc, char** argv) {
     try {
         tool::CheckedOutput output(std::cout, STDOUT_FILENO);
         const int status = run(argc, argv);
         output.finish();
         return status;
-    } catch (const tool::OutputFailure& failure) { // the stream is an ordinary one again
+    } catch (const tool::OutputFailure& failure) { // the stream is the default one again
         if (!failure.readerLeft())
             tool::printError("standard output", std::generic_category().message(failure.systemError()));
         return tool::kUnreadable;

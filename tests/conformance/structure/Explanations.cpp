@@ -14,7 +14,7 @@
 namespace conformance {
 namespace {
 
-/// Whether the text is what the pattern says, where `*` stands for any number of characters.
+/// Whether the text matches the pattern, where `*` matches any number of characters.
 bool matches(std::string_view pattern, std::string_view text) {
     std::size_t at = 0, p = 0, star = std::string_view::npos, resume = 0;
     while (at < text.size()) {

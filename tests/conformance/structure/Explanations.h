@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Deviations that have a reason.
+// Deviations with a reason.
 #pragma once
 
 #include <filesystem>
@@ -12,11 +12,11 @@ namespace conformance {
 
 class Explanations {
 public:
-    /// Those of the file that are about this form: a list of {reason, forms, deviations}, where `*` in a deviation
-    /// stands for anything. Throws std::runtime_error when one has no reason.
+    /// Those of the file for this form: a list of {reason, forms, deviations}, where `*` in a deviation
+    /// matches anything. Throws std::runtime_error when one has no reason.
     Explanations(const std::filesystem::path& path, const std::string& form);
 
-    /// Whether one of them is about the deviation.
+    /// Whether one of them explains the deviation.
     bool explain(const std::string& deviation);
     /// Patterns that have explained nothing so far.
     [[nodiscard]] std::vector<std::string> unused() const;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The kind of a record is its name, and where one name stands for many kinds, what tells them apart: the class of an
+// The kind of a record is its name, and where one name has many kinds, what distinguishes them: the class of an
 // object, the name of a property, the part of a transform that a channel moves.
 #include "Structure.h"
 
@@ -18,8 +18,8 @@ using fbxsdk::detail::RecordTree;
 
 bool isProperty(const Record& record) { return record.name == "Property" || record.name == "P"; }
 
-/// Properties that a user made are named as they like, and so are those that applications put into compounds of their
-/// own. What a file says of its origin is a compound, too, but always the same one.
+/// User properties have arbitrary names, and so have those that applications put into compounds of their
+/// own. What a file states about its origin is a compound, too, but always the same one.
 bool isFree(const Record& record) {
     const std::string_view flags = record.value(record.name == "P" ? 3 : 2).toText();
     const std::string_view name = record.value(0).toText();
@@ -35,7 +35,7 @@ std::string channelKind(const Record& record) {
     return "Channel " + std::string(known ? name : "of a property");
 }
 
-/// Empty for what is not looked at.
+/// Empty for ignored records.
 std::string kindOf(const std::string& path, const Record& record) {
     const std::string name(record.name);
     if (isProperty(record))
@@ -49,7 +49,7 @@ std::string kindOf(const std::string& path, const Record& record) {
     return name;
 }
 
-/// The types that a property states belong to how it is stored.
+/// The types of a property are part of how it is stored.
 std::string storedAs(const RecordTree& tree, const Record& record) {
     std::string codes = valueCodes(tree, record);
     if (isProperty(record)) {
@@ -62,8 +62,8 @@ std::string storedAs(const RecordTree& tree, const Record& record) {
     return record.hasBlock ? codes + '{' : codes;
 }
 
-/// A place whose records differ in the number of values, of which some have many, holds lists. In a list it counts
-/// which value stands behind which.
+/// A place whose records differ in the number of values, some having many, holds lists. In a list only
+/// which value follows which is compared.
 bool holdsLists(const Place& place) {
     constexpr std::size_t kValuesOfAFixedRecord = 5;
     constexpr std::size_t kNumbersOfAMatrix = 16;
@@ -118,7 +118,7 @@ private:
             if (!their.children.contains(kind))
                 mFound.push_back("nowhere else: " + path + '/' + kind);
         }
-        constexpr std::size_t kEnoughFiles = 2; // one alone may be the odd one
+        constexpr std::size_t kEnoughFiles = 2; // a single one may be an exception
         for (const auto& [kind, count] : their.children) {
             const auto written = our.children.find(kind);
             const int ourCount = written == our.children.end() ? 0 : written->second;
@@ -127,7 +127,7 @@ private:
         }
     }
 
-    /// Objects of one kind of record stand in the order of the scene.
+    /// Objects of one kind of record are in the order of the scene.
     static bool areOfOneRecord(const std::string& first, const std::string& second) {
         const std::size_t space = first.find(' ');
         return space != std::string::npos && first.compare(0, space + 1, second, 0, space + 1) == 0;

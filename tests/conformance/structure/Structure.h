@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What records files have: for every place in the tree which records stand in it, in which order, and how their values
+// The structure of files: for every place in the tree which records it has, in which order, and how their values
 // are stored. Objects of different classes are different places.
 #pragma once
 
@@ -19,7 +19,7 @@ struct Place {
     int records = 0;
     std::set<std::string> files;                         ///< that have one
     std::set<std::string> codes;                         ///< how their values are stored, one entry for each way
-    std::map<std::string, int> children;                 ///< in how many of the records each kind of child stands
+    std::map<std::string, int> children;                 ///< in how many of the records each kind of child occurs
     std::set<std::pair<std::string, std::string>> order; ///< kinds of which the first was seen to begin earlier
 };
 
@@ -39,8 +39,8 @@ private:
     std::map<std::string, Place> mPlaces;
 };
 
-/// A sentence for whatever `ours` has otherwise than all of `theirs`. Places that theirs do not have are named once,
-/// not with all that is in them.
+/// A sentence for every difference of `ours` from all of `theirs`. Places that theirs do not have are named once,
+/// without their content.
 std::vector<std::string> deviations(const Structure& ours, const Structure& theirs);
 
 } // namespace conformance

@@ -1,9 +1,9 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Writes the files that applications saved in a version anew, in the same version, and compares the records of the
-// copies with those of the files. The scenes are the same, so whatever differs is the writer's doing. Fails on every
-// deviation that the table beside does not explain, and on every explanation that explains nothing.
+// Rewrites the files that applications saved in a version, in the same version, and compares the records of the
+// copies with those of the files. The scenes are the same, so every difference is the writer's. Fails on every
+// deviation that the table next to it does not explain, and on every explanation that explains nothing.
 #include "../Corpus.h"
 #include "../Rewriting.h"
 #include "Explanations.h"
@@ -24,7 +24,7 @@ namespace {
 constexpr int kSkipped = 77; // ctest's SKIP_RETURN_CODE
 constexpr int kUsage = 2;
 
-/// Files that were made by hand break rules on purpose.
+/// Files that were made by hand break rules deliberately.
 bool isMadeByHand(const std::string& name) { return name.starts_with("synthetic_"); }
 
 /// The scripted exporter follows rules of its own.
@@ -70,7 +70,7 @@ int run(const std::string& formText) {
             continue;
         if (tree->ascii == form.ascii)
             theirs.add(file.name, *tree);
-        // The other encoding holds the same: its copies count, too.
+        // The other encoding has the same data: its copies count, too.
         if (const std::optional<CorpusFile> copy = rewritten.rewrite(file))
             addCopy(*copy, version, ours);
     }

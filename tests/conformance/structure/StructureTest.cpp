@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The comparison itself: what it sees, and what it lets pass.
+// The comparison itself: what it reports, and what it accepts.
 #include "Structure.h"
 
 #include "Explanations.h"

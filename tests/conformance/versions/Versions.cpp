@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// One scene in several versions: files that differ in nothing but version and encoding must read the same. Every file
-// is held against the newest one of its scene: the nodes by their paths, where they are, and the points of their
+// One scene in several versions: files that differ only in version and encoding must read the same. Every file
+// is compared with the newest one of its scene: the nodes by their paths, their placement, and the points of their
 // meshes as the library deforms them, at the beginning, in the middle and at the end of the first stack.
 #include "../Corpus.h"
 
@@ -53,7 +53,7 @@ void appendMatrix(const FbxAMatrix& matrix, Numbers& numbers) {
     }
 }
 
-/// The mean, the least and the largest coordinate of the deformed points; programs may number points anew.
+/// The mean, the minimum and the maximum coordinate of the deformed points; programs may renumber points.
 Numbers extentOf(FbxSdk& sdk, FbxNode& node, FbxMesh& mesh, FbxTime time) {
     FbxAMatrix global = node.EvaluateGlobalTransform(time);
     const FbxAMatrix geometric(node.GetGeometricTranslation(FbxNode::eSourcePivot),
@@ -65,7 +65,7 @@ Numbers extentOf(FbxSdk& sdk, FbxNode& node, FbxMesh& mesh, FbxTime time) {
     const std::unique_ptr<FbxVector4[]> points(made);
     const int count = made ? mesh.GetControlPointsCount() : 0;
     Numbers sum(3, 0.0), least(3, HUGE_VAL), most(3, -HUGE_VAL);
-    const bool inWorld = mesh.GetDeformerCount(FbxDeformer::eSkin) > 0; // skins take their points there themselves
+    const bool inWorld = mesh.GetDeformerCount(FbxDeformer::eSkin) > 0; // skins move their points there themselves
     for (int i = 0; i < count; ++i) {
         const FbxVector4 point =
             inWorld ? points[static_cast<std::size_t>(i)] : place.MultT(points[static_cast<std::size_t>(i)]);

@@ -1,6 +1,6 @@
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
-"""Exports the cameras of this folder with Blender, and what Blender says of them, on every frame, to cameras.json:
+"""Exports the cameras of this folder with Blender, and Blender's own values on every frame to cameras.json:
 
     blender --background --factory-startup --python export_cameras.py [-- FOLDER]
 
@@ -41,7 +41,7 @@ def camera(name, location, rotation, sensor, **values):
 
 
 def handheld():
-    """A camera that follows a rig, which is turned, scaled and moves, and pulls its lens; 59.94 frames per second."""
+    """A camera that follows a rig, which is rotated, scaled and moves, and zooms; 59.94 frames per second."""
     scene_of(1920, 1080, 60, 1.001)
     rig = fixtures.add("rig", None)
     rig.rotation_euler = (0.0, 0.0, math.radians(30.0))

@@ -1,7 +1,7 @@
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
 #
-# Writes the files beside it: `clean.fbx`, in which lint finds nothing but that it is a text, and one file per rule with
+# Writes the files next to it: `clean.fbx`, in which lint finds only that it is ASCII, and one file per rule with
 # the one thing in it that the rule is about. Called as: make_lint_files.py
 import os
 

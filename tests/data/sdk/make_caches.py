@@ -1,11 +1,11 @@
 # SPDX-License-Identifier: MIT
 # Copyright (c) Tarnell FBX contributors
 #
-# Makes the point caches that caches_7400_ascii.fbx refers to, in the folder "caches" beside this file:
+# Makes the point caches that caches_7400_ascii.fbx refers to, in the folder "caches" next to this file:
 #
 #     python3 make_caches.py
 #
-# Each has three points; at frame f of 24 per second the point p stands at (p, f * f, number of the cache).
+# Each has three points; at frame f of 24 per second the point p is at (p, f * f, number of the cache).
 import pathlib
 import struct
 

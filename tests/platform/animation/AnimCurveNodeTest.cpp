@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Curve nodes and their channels, and how properties find and make their curves.
+// Curve nodes and their channels, and how properties find and create their curves.
 #include <fbxsdk/FbxCamera.h>
 #include <fbxsdk/FbxLight.h>
 
@@ -212,7 +212,7 @@ TEST_F(FbxAnimCurveNodeTest, OfAPropertyIsFoundByStackOrAlone) {
 
 TEST_F(FbxAnimCurveNodeTest, GivesTheCurveOfAComponentAndMakesItOnDemand) {
     EXPECT_EQ(node->LclTranslation.GetCurve(layer, "X"), nullptr);
-    EXPECT_EQ(node->LclTranslation.GetSrcObjectCount(), 0); // asking makes nothing
+    EXPECT_EQ(node->LclTranslation.GetSrcObjectCount(), 0); // a look-up creates nothing
 
     FbxAnimCurve* made = node->LclTranslation.GetCurve(layer, "Lcl Translation", "Y", true);
 

@@ -31,7 +31,7 @@ protected:
             list.push_back(curve->KeyGetValue(i));
         return list;
     }
-    /// A linear key at so many ticks.
+    /// A linear key at that many ticks.
     int key(std::int64_t ticks, float value) {
         const int index = curve->KeyAdd(FbxTime(ticks));
         curve->KeySet(index, FbxTime(ticks), value, Def::eInterpolationLinear);

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A scene with one stack, its base layer and one node, and short ways to keys.
+// A scene with one stack, its base layer and one node, and helpers for keys.
 #pragma once
 
 #include <initializer_list>
@@ -49,7 +49,7 @@ protected:
         }
     }
 
-    /// A curve node whose channels stand at the values.
+    /// A curve node whose channels have these values.
     static fbxsdk::FbxAnimCurveNode* set(fbxsdk::FbxProperty property, fbxsdk::FbxAnimLayer* on, double x, double y = 0,
                                          double z = 0) {
         fbxsdk::FbxAnimCurveNode* made = property.GetCurveNode(on, /*pCreate=*/true);

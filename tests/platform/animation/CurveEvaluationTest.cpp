@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Curves against closed forms, against numbers of real files, and against keys nobody should write.
+// Curves against closed forms, against numbers of real files, and with invalid keys.
 #include <cmath>
 #include <limits>
 #include <random>
@@ -62,7 +62,7 @@ CurveKeys curveOf(const std::vector<Key>& keys, Extrapolation before = {}, Extra
 
 float at(const CurveKeys& curve, double seconds) { return detail::evaluate(curve, ticks(seconds)); }
 
-/// Key times of files count frames.
+/// Key times of files are whole frames.
 Key keyAtFrame(double frame, double rate, Key key) {
     key.seconds = frame / rate;
     return key;
@@ -73,7 +73,7 @@ TEST(CurveEvaluation, GivesTheDefaultValueWithoutKeys) {
     EXPECT_EQ(at(curve, 1.0), 0.0F);
     curve.defaultValue = 7.5F;
     EXPECT_EQ(at(curve, 1.0), 7.5F);
-    curve.times.push_back(0); // a key without value is none
+    curve.times.push_back(0); // a key without value is not counted
     EXPECT_EQ(at(curve, 1.0), 7.5F);
 }
 
@@ -290,7 +290,7 @@ TEST(CurveEvaluation, GoesOnInALineWhenTheSlopeIsKept) {
     EXPECT_EQ(at(constant, 3.0), 5.0F);
 }
 
-// the numbers of a MotionBuilder file, and what a reader of its own makes of them
+// the numbers of a MotionBuilder file, and the values that an independent reader gives for them
 TEST(CurveEvaluation, MirrorsAMotionBuilderCurveAsOftenAsItsFileSays) {
     const auto keys = {keyAtFrame(1.0, 24.0, {0.0, 0.0F, kUser, -30.9737F, -27.9356F}),
                        keyAtFrame(24.0, 24.0, {0.0, 10.0F, kUser, -27.9356F, 0.0F})};

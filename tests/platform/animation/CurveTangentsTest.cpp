@@ -105,7 +105,7 @@ TEST(CurveTangents, DoNotPassTheNeighbourWithTheProgressiveClamp) {
     expectSlope(middle(0.0F, 5.0F, 10.0F), 1, 5.0); // nothing to limit
     expectSlope(middle(0.0F, -1.0F, -10.0F), 1, -3.0);
     expectSlope(middle(0.0F, 10.0F, 0.0F), 1, 0.0); // a peak
-    expectSlope(middle(0.0F, 10.0F, 3.0F), 1, 0.0); // the chord falls, the way here rose
+    expectSlope(middle(0.0F, 10.0F, 3.0F), 1, 0.0); // the chord falls, the segment before rose
     expectSlope(middle(0.0F, 0.0F, 10.0F), 1, 0.0);
 }
 
@@ -140,7 +140,7 @@ TEST(CurveTangents, AddAnAbsoluteAmountBeyondABiasOf500) {
     EXPECT_GT(detail::rightSlope(between(-0.0001F, -0.0002F, -800.0F), 1), 359.0);
 }
 
-// Four tangents of a MotionBuilder file whose handles end at round values: -2.5, 1, 2 and, beside a peak, -1.
+// Four tangents of a MotionBuilder file whose handles end at round values: -2.5, 1, 2 and, next to a peak, -1.
 TEST(CurveTangents, PutTheHandlesOfAMotionBuilderFileWhereItsUserDraggedThem) {
     constexpr double kFrame = 1.0 / 24.0;
     const CurveKeys curve = curveOf({{0.0, 0.0F, kAuto, -570.711F, 0.0F},
@@ -164,7 +164,7 @@ TEST(CurveTangents, PutTheHandlesOfAMotionBuilderFileWhereItsUserDraggedThem) {
 }
 
 TEST(CurveTangents, HaveNoBiasWhenIndependentOfTime) {
-    // Maya stores the slope itself there, MotionBuilder the shift that the flag stands for
+    // Maya stores the slope itself there, MotionBuilder the shift that the flag represents
     const CurveKeys curve =
         curveOf({{0.0, 0.0F, kSpline, 0.0F, 61.7143F}, {1.0, 45.0F, kSpline}, {3.0, 90.0F, kSpline}});
     expectSlope(curve, 1, 30.0);

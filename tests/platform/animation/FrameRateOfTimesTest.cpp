@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Which frame rate key times tell.
+// The frame rate that is derived from key times.
 #include "animation/FrameRateOfTimes.h"
 
 #include <algorithm>
@@ -19,7 +19,7 @@ using Times = std::vector<std::int64_t>;
 
 std::int64_t timeOf(double frame, double rate) { return std::llround(frame / rate * kTicksPerSecond); }
 
-/// Every so many frames from the first to the last one.
+/// Every n-th frame from the first to the last one.
 Times timesAt(double rate, int first, int last, int step = 1) {
     Times times;
     for (int frame = first; frame <= last; frame += step)

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The inspection of caches that claim more than anybody wants to read: its time and memory grow with the file alone.
+// The inspection of caches that state excessive counts: its time and memory grow with the file only.
 #include <fbxsdk/extensions/CacheFacts.h>
 
 #include <algorithm>
@@ -35,7 +35,7 @@ extensions::CacheFacts factsOf(const std::string& file) {
 }
 
 TEST(CacheFacts, TellsAHundredThousandChannelsApart) {
-    constexpr std::size_t kChannels = 100'000; // each looked for among all takes a minute
+    constexpr std::size_t kChannels = 100'000; // a separate search for each would take a minute
     const std::vector<double> point = {1, 2, 3};
     std::vector<std::string> names;
     for (std::size_t i = 0; i < kChannels; ++i)
@@ -53,7 +53,7 @@ TEST(CacheFacts, TellsAHundredThousandChannelsApart) {
 
 TEST(CacheFacts, ListsAThousandFaultsAndSaysThatThereAreMore) {
     const std::vector<double> point = {kNaN, 2, 3};
-    const std::string longName(1'000'000, 'n'); // in each of the faults it would be gigabytes
+    const std::string longName(1'000'000, 'n'); // repeated in each of the faults it would be gigabytes
     const std::vector<detail::MayaCacheWriteBlock> blocks(5000, {"a", point});
     const support::TemporaryFolder folder;
     std::string data = dataOf(blocks);

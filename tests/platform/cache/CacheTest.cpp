@@ -2,7 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Point caches as objects: names and formats, both kinds of files written and read back, and every call in every state
-// it is not meant for.
+// that does not support it.
 #include <algorithm>
 #include <array>
 #include <limits>
@@ -249,7 +249,7 @@ TEST_F(FbxCacheTest, WritesOnlyFramesThatWereAnnounced) {
         EXPECT_FALSE(made->Write(wrong, points.data(), &status)) << wrong;
     EXPECT_TRUE(made->Write(11U, points.data()));
     EXPECT_TRUE(made->CloseFile());
-    ASSERT_TRUE(made->OpenFileForRead()); // whole although two samples were never written
+    ASSERT_TRUE(made->OpenFileForRead()); // complete although two samples were never written
     EXPECT_EQ(made->GetSampleCount(), 3U);
 }
 

@@ -199,7 +199,7 @@ TEST(MayaCache, RefusesDataThatIsCutOff) {
         opened += reader ? 1 : 0;
         EXPECT_EQ(status.Error(), !reader) << length;
     }
-    EXPECT_EQ(opened, 2); // right behind the first and the second sample
+    EXPECT_EQ(opened, 2); // shortly after the first and the second sample
 }
 
 TEST(MayaCache, SaysWhereItsDataIsDamaged) {

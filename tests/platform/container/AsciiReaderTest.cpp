@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// ASCII files: the grammar and every oddity that real writers have brought into it.
+// ASCII files: the grammar and the deviations of real writers from it.
 #include "container/AsciiReader.h"
 
 #include <cmath>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// ASCII files, character by character: readers that go line by line depend on the layout.
+// ASCII files, character by character: readers that parse line by line depend on the layout.
 #include "container/AsciiSink.h"
 
 #include <limits>
@@ -20,7 +20,7 @@ namespace {
 using support::Container;
 using support::sinkBytes;
 
-/// What stands behind the three lines of the header.
+/// The content after the three lines of the header.
 std::string asciiBody(std::uint32_t version, const support::Emit& emit) {
     const std::string text = sinkBytes(Container::ascii, version, emit);
     return text.substr(text.find("\n\n") + 2);

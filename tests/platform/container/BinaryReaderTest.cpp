@@ -226,7 +226,7 @@ TEST(BinaryReader, AcceptsABlockThatEndsWithoutANullRecord) {
     file.end();
     file.begin("Next").int32(2).end();
     std::string bytes = file.finish();
-    // The null record is 13 zeros in front of the next record; take it out, and 13 from all ends behind it.
+    // The null record is 13 zeros before the next record; remove it, and subtract 13 from all ends after it.
     const std::size_t next = bytes.find("Next") - 13;
     bytes.erase(next - 13, 13);
     bytes[27] = static_cast<char>(bytes[27] - 13);

@@ -159,7 +159,7 @@ TEST(BinarySink, KeepsAnySizeWithWideHeads) {
     EXPECT_FALSE(sink.failed());
 }
 
-/// Forgets what it gets.
+/// Discards its input.
 class CountingOutput final : public ByteOutput {
 public:
     void write(std::span<const char> bytes) override { mSize += bytes.size(); }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files that are read piece by piece, and that somebody else changes meanwhile.
+// Files that are read in parts, and changed by others meanwhile.
 #include "container/FileBytes.h"
 
 #include <filesystem>
@@ -112,7 +112,7 @@ TEST_F(FileBytesTest, AreFetchedAheadOfAReader) {
 
 TEST_F(FileBytesTest, ComeThroughPipes) {
     ASSERT_EQ(mkfifo(mFolder.file("pipe").c_str(), 0600), 0);
-    const int both = ::open(mFolder.file("pipe").c_str(), O_RDWR | O_CLOEXEC); // a writer before the reader
+    const int both = ::open(mFolder.file("pipe").c_str(), O_RDWR | O_CLOEXEC); // the writer is opened before the reader
     std::jthread writer([&] {
         std::ofstream(mFolder.file("pipe"), std::ios::binary) << mContent;
         ::close(both);

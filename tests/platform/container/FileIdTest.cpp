@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Times of files, and the codes that belong to times of known files.
+// Times of files, and the codes of known files for their times.
 #include "container/FileId.h"
 
 #include <cstdio>

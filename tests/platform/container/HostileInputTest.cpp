@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files that lie, end too early, or were made to hurt: a sentence or a sound tree, and never more memory than the file
-// is worth.
+// Files that are inconsistent, truncated, or crafted: a reason or a valid tree, and memory in proportion to the
+// file's size.
 #include <algorithm>
 #include <memory_resource>
 #include <random>
@@ -20,7 +20,7 @@ using namespace fbxsdk::detail;
 
 namespace {
 
-/// A bit of everything.
+/// A record of every type.
 std::string binaryFile(std::uint32_t version, ByteOrder order) {
     BinaryRecordBuilder file(version, order);
     file.begin("FBXHeaderExtension").block();
@@ -176,7 +176,7 @@ TEST(HostileInput, RefusesAChildThatReachesBeyondItsParent) {
 
 TEST(HostileInput, RefusesValuesThatExceedTheirRecord) {
     for (const char code : std::string_view("CBZYILFDSRilfdbc")) {
-        // A value that is cut off by the end of its record, in front of bytes that could be mistaken for it.
+        // A value that is truncated by the end of its record, before bytes that could be mistaken for it.
         const std::string bytes = BinaryRecordBuilder(7400)
                                       .begin("List")
                                       .letter('x')
@@ -225,7 +225,7 @@ TEST(HostileInput, RefusesCompressedArraysThatNoStreamCanHold) {
 }
 
 TEST(HostileInput, RefusesArraysThatTogetherExpandBeyondReason) {
-    // Each is a sound stream of a megabyte and more of zeros in a few hundred bytes.
+    // Each is a valid stream of a megabyte and more of zeros in a few hundred bytes.
     const std::vector<double> zeros(150'000);
     BinaryRecordBuilder file(7400);
     const std::string stream = BinaryRecordBuilder::deflated(file.encode(zeros));
@@ -271,14 +271,14 @@ TEST(HostileInput, ReadsDeepFilesAndRefusesBottomlessOnes) {
 }
 
 TEST(HostileInput, RefusesAnEndlessCycleOfRecords) {
-    // Records that end where they began would be read for ever.
+    // Records that end where they began would be read endlessly.
     std::string bytes = BinaryRecordBuilder(7400).begin("A").block().end().finish();
     bytes[27] = 27;
 
     EXPECT_TRUE(readText(bytes).starts_with("test.fbx: offset 27: end offset 27"));
 }
 
-/// Counts what passes through it.
+/// Counts the bytes that pass through it.
 class CountingResource : public std::pmr::memory_resource {
 public:
     [[nodiscard]] std::size_t taken() const { return mTaken; }
@@ -329,7 +329,7 @@ private:
     std::pmr::memory_resource* mPrevious;
 };
 
-/// Files that consist of the smallest things that cost memory.
+/// Files that consist of the smallest records that take memory.
 std::vector<std::string> dustFiles() {
     constexpr int kCount = 300'000;
     std::vector<std::string> files;

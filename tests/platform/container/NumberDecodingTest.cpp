@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Numbers in every stored form, asked for in every type.
+// Numbers in every stored form, read in every type.
 #include "container/NumberDecoding.h"
 
 #include <bit>

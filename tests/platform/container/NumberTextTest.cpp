@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Numbers as text: what is one, where it ends, and what it is worth in whatever locale.
+// Numbers as text: what is one, where it ends, and its value in any locale.
 #include "container/NumberText.h"
 
 #include <clocale>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A file is there completely or not at all, whatever fails.
+// A file is written completely or not at all, whatever fails.
 #include "container/OutputFile.h"
 
 #include <algorithm>
@@ -437,7 +437,7 @@ TEST(OutputFile, ExtendsBeyondWhatFitsInMemoryOrOnTheMedium) {
     EXPECT_EQ(fs::file_size(folder.file("a.fbx")), kSize);
 }
 
-/// Keeps the largest number of bytes that are handed over at once.
+/// Records the largest number of bytes that are passed at once.
 class MeasuringOperations final : public FileOperations {
 public:
     int write(int file, std::span<const char> bytes) override {
@@ -563,7 +563,7 @@ TEST(OutputFilesTogether, OfOneNameAreTheLastOneOrWhatStoodThereBefore) {
     }
 }
 
-/// A file system on which a file has one name.
+/// A file system without hard links.
 class WithoutLinks final : public FileOperations {
 public:
     int link(const std::string&, const std::string&) override { return EPERM; }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Pages that are given back are zeros.
+// Released pages are zero.
 #include "container/PageMemory.h"
 
 #include <algorithm>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The way from a file name to records: what cannot be opened, what is no such file, and what is kept alive.
+// From a file name to records: what cannot be opened, what is no FBX file, and what is kept in memory.
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
@@ -36,7 +36,7 @@ protected:
         std::ofstream(path(name), std::ios::binary) << bytes;
         return path(name);
     }
-    /// The sentence of a refusal, without the file name in front.
+    /// The message of a refusal, without the file name in front.
     [[nodiscard]] static std::string refusal(const std::string& fileName) {
         FbxStatus status;
         EXPECT_FALSE(readRecords(fileName, status));

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The hand-made files of tests/data/container, each beside what it must give.
+// The hand-made files of tests/data/container, each with its expected records.
 #include <filesystem>
 #include <fstream>
 #include <iterator>

@@ -46,7 +46,7 @@ protected:
     [[nodiscard]] static std::string bytesOf(const support::Emit& emit) {
         return sinkBytes(GetParam().container, GetParam().version, emit);
     }
-    /// The first record of what was written.
+    /// The first record of the output.
     const Record& readBack(const support::Emit& emit) {
         mBytes = bytesOf(emit);
         FbxStatus status;

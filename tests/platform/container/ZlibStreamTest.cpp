@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Streams in and out. Short ones that came lately are remembered, which nobody must notice.
+// Streams in and out. Recent short ones are cached, which must not be observable.
 #include "container/ZlibStream.h"
 
 #include <string>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Converting a scene to another axis system: every global matrix is turned by the same rotation, at every time.
+// Converting a scene to another axis system: every global matrix is rotated by the same rotation, at every time.
 #include <array>
 #include <string>
 #include <vector>
@@ -31,7 +31,7 @@ plain::Matrix basisOf(const FbxAxisSystem& system) {
     return basis;
 }
 
-/// What carries the source's axes onto the target's.
+/// The rotation from the source's axes to the target's.
 plain::Matrix turnBetween(const FbxAxisSystem& source, const FbxAxisSystem& target) {
     return basisOf(target) * plain::transposed(basisOf(source));
 }
@@ -60,7 +60,7 @@ protected:
         EXPECT_EQ(scene->GetGlobalSettings().GetAxisSystem(), target);
     }
 
-    /// A tree with pivots, orders, rotations in force and not, and every inherit type.
+    /// A tree with pivots, orders, rotations active and not, and every inherit type.
     void buildTree(SeededRandom& random, FbxAnimLayer* layer) {
         FbxNode* parent = nullptr;
         for (int i = 0; i < 16; ++i) {
@@ -124,7 +124,7 @@ TEST_F(AxisConversionTest, TurnsEveryGlobalMatrixFromEverySystem) {
     SeededRandom random(11);
     buildTree(random, addStack(*scene));
 
-    // Each conversion starts from where the last one ended.
+    // Each conversion starts from the result of the last one.
     for (const FbxAxisSystem& system : systems) {
         expectAllTurned(scene->GetGlobalSettings().GetAxisSystem(), system);
         ASSERT_FALSE(HasFailure());

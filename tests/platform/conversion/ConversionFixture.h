@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Scenes that are converted to another unit or other axes, and where their nodes stand before and after.
+// Scenes that are converted to another unit or other axes, and the placement of their nodes before and after.
 #pragma once
 
 #include <cstddef>
@@ -37,7 +37,7 @@ protected:
         return matrices;
     }
 
-    /// Every global matrix is the change times what it was.
+    /// Every global matrix is the change times its former value.
     void expectAllChanged(const std::vector<plain::Matrix>& before, const plain::Matrix& change, double tolerance) {
         constexpr std::size_t kPerNode = std::size(kTimes) + 1;
         const auto after = globals();

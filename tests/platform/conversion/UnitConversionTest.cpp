@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Converting a scene to another unit: every global matrix becomes the factor times what it was, at every time.
+// Converting a scene to another unit: every global matrix becomes the factor times its former value, at every time.
 #include <algorithm>
 #include <string>
 #include <vector>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The affine matrix: its storage, what it is made of, products and inverses.
+// The affine matrix: its storage, composition and decomposition, products and inverses.
 #include <cmath>
 #include <limits>
 #include <random>

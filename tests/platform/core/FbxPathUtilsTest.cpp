@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Paths as text, and folders on the disk.
+// Paths as text, and folders on disk.
 #include <filesystem>
 #include <fstream>
 #include <string>
@@ -20,7 +20,7 @@ struct TextRow {
     const char* expected;
 };
 
-/// A folder of this test alone, gone at its end.
+/// A folder for this test, removed at its end.
 class TemporaryFolder {
 public:
     TemporaryFolder() {

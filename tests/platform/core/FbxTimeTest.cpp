@@ -23,7 +23,7 @@ using namespace fbxsdk;
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 constexpr double kInfinity = std::numeric_limits<double>::infinity();
 
-/// Leaves the thread's global time mode as it was found.
+/// Restores the thread's global time mode.
 class GlobalTimeModeGuard {
 public:
     GlobalTimeModeGuard() : mMode(FbxTime::GetGlobalTimeMode()), mCustomRate(FbxTime::GetFrameRate(FbxTime::eCustom)) {}
@@ -52,7 +52,7 @@ struct RateRow {
     FbxLongLong ticksPerFrame; ///< 0 where no whole number is exact
 };
 
-// written out by hand; walks beside the table of the code
+// written out by hand; compared row by row with the table of the code
 constexpr RateRow kRates[] = {
     {FbxTime::eFrames120, 1, 120.0, 384884650},
     {FbxTime::eFrames100, 2, 100.0, 461861580},

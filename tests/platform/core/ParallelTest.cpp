@@ -25,7 +25,7 @@ struct Parallel : testing::Test {
     ~Parallel() override { extensions::setMaximumThreads(1); }
 };
 
-/// The threads that a thousand short pieces of work were done on.
+/// The threads that did a thousand short pieces of work.
 std::set<std::thread::id> threadsAtWork() {
     std::mutex mutex;
     std::set<std::thread::id> threads;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Euler angles, axes and quaternions into each other and back, for every order.
+// Conversions between Euler angles, axes and quaternions, for every order.
 #include <algorithm>
 #include <cmath>
 #include <random>
@@ -26,7 +26,7 @@ constexpr OrderRow kOrders[] = {
     {eEulerZXY, "ZXY"}, {eEulerZYX, "ZYX"}, {eSphericXYZ, "XYZ"},
 };
 
-/// What a conversion there and back may lose, in units of the matrix's elements.
+/// The loss of a conversion and its inverse, in units of the matrix's elements.
 constexpr double kRoundTrip = 4.0e-15;
 
 double largestDifference(const Axes& a, const Axes& b) {
@@ -50,7 +50,7 @@ std::string print(const Axes& axes) {
     return text;
 }
 
-/// The elementary turn about one axis, from the textbook.
+/// The elementary rotation about one axis.
 FbxAMatrix turn(char axis, double degrees) {
     const double c = std::cos(degrees * FBXSDK_PI_DIV_180);
     const double s = std::sin(degrees * FBXSDK_PI_DIV_180);

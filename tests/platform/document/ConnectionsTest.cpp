@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Which connections survive, and that the Models form a tree.
+// Which connections are kept, and that the Models form a tree.
 #include "DocumentFromText.h"
 
 namespace fbxsdk::detail {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Documents from text that stands in a test, and questions to ask them.
+// Documents from text in a test, and queries to them.
 #pragma once
 
 #include <algorithm>
@@ -28,7 +28,7 @@ inline std::unique_ptr<Document> tryDocument(std::string text, FbxStatus* status
     return readDocument(std::move(tree), outcome);
 }
 
-/// A document that must load; the text stands behind a version comment.
+/// A document that must load; the text is preceded by a version comment.
 inline std::unique_ptr<Document> documentOf(const std::string& version, const std::string& text) {
     FbxStatus status;
     std::unique_ptr<Document> document = tryDocument("; FBX " + version + " project file\n" + text, &status);

@@ -11,7 +11,7 @@ namespace {
 
 constexpr int kMany = 100'000;
 
-/// Generous: what grows with the square of the size takes minutes.
+/// Generous: quadratic growth takes minutes.
 constexpr std::chrono::seconds kLongest{20};
 
 class Stopwatch {
@@ -34,7 +34,7 @@ TEST(HostileDocument, AChainOfAHundredThousandModelsStaysAChain) {
     }
     const auto document = documentOf("7.5.0", objects + "}\n" + connections + "}\n");
     EXPECT_EQ(document->objects.size(), static_cast<std::size_t>(kMany));
-    EXPECT_EQ(document->connections.size(), static_cast<std::size_t>(kMany)); // the last one led nowhere
+    EXPECT_EQ(document->connections.size(), static_cast<std::size_t>(kMany)); // the last one was dangling
     EXPECT_TRUE(isConnected(*document, 1, 0));
     EXPECT_TRUE(isConnected(*document, kMany, kMany - 1));
 }
@@ -148,7 +148,7 @@ Version5: { Settings: { FrameRate: "24" } })";
     }
 }
 
-/// A document of those records either loads soundly or is refused with a reason.
+/// A document of those records either loads consistently or is refused with a reason.
 void expectSoundOrRefused(const std::string& text) {
     FbxStatus status;
     const auto document = tryDocument(text, &status);
@@ -185,7 +185,7 @@ constexpr const char* kInnerRecords[] = {
     "Texture",      "Normals",      "Materials", "GeometryUVInfo",    "Vertices",       "Channel", "Type",
     "TypeFlags",    "Properties",   "PoseNode",  "NodeAttributeName", "CameraAperture", "Key",     "KeyTime",
 };
-/// Beginnings and ends that the inner records are put between.
+/// Prefixes and suffixes of the inner records.
 constexpr std::pair<const char*, const char*> kPlaces[] = {
     {"Model: \"Model::m\" {", "}"},
     {"Objects: { Model: 1, \"Model::m\", \"Mesh\" {", "} }"},

@@ -9,7 +9,7 @@
 namespace fbxsdk::detail {
 namespace {
 
-/// A tree as the binary reader makes it, without any record but those that the test adds.
+/// A tree as the binary reader creates it, without any record but those that the test adds.
 std::unique_ptr<RecordTree> binaryTree(std::uint32_t version) {
     auto tree = std::make_unique<RecordTree>();
     tree->version = version;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Property names, comparison of records, and the warnings' bounds.
+// Property names, comparison of records, and the limit of warnings.
 #include "DocumentFromText.h"
 
 #include "document/DocumentBuilder.h"

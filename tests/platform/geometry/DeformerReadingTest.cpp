@@ -168,7 +168,7 @@ TEST_F(DeformerReading, PrefersThePropertyToTheRecord) {
     object.body = source->objects.front().body;
     object.properties.emplace_back().name = "DeformPercent";
     auto* channel = make<FbxBlendShapeChannel>();
-    channel->DeformPercent.Set(60.0); // what the reader of properties has done
+    channel->DeformPercent.Set(60.0); // as the reader of properties does
 
     fbxsdk::detail::readDeformer(*channel, source, object);
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Deformers and what they hang together by.
+// Deformers and their connections.
 #include "GeometryFixture.h"
 
 #include <fbxsdk/FbxAnimCurve.h>

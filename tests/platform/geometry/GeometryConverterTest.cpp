@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Surfaces and polygons become meshes of triangles; what hangs on them comes along.
+// Conversion of surfaces and polygons to triangle meshes, with everything that is connected to them.
 #include <fbxsdk/FbxGeometryConverter.h>
 
 #include <fbxsdk/FbxAnimCurve.h>
@@ -47,7 +47,7 @@ protected:
         return FbxCast<FbxMesh>(converter.Triangulate(attribute, replace));
     }
 
-    /// A square with a corner more, and a triangle.
+    /// A square with one more corner, and a triangle.
     FbxMesh* polygons() {
         auto* mesh = make<FbxMesh>("polygons");
         mesh->InitControlPoints(6);

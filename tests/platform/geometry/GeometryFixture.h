@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// A scene whose geometry is written down as the records of a file.
+// A scene whose geometry is given as the records of a file.
 #pragma once
 
 #include <deque>
@@ -60,7 +60,7 @@ protected:
 
 private:
     std::deque<std::string> mTexts; ///< a tree points into its text
-    // The manager goes first: geometry may still point into the texts.
+    // The manager is destroyed first: geometry may still point into the texts.
 protected:
     fbxsdk::FbxManager* manager;
     fbxsdk::FbxScene* scene;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Layers and elements from the records of files: every spelling of the modes, and what files leave out.
+// Layers and elements from the records of files: every spelling of the modes, and what files omit.
 #include "GeometryFixture.h"
 
 #include <string>
@@ -41,7 +41,7 @@ class LayerReading : public GeometryFixture {
 protected:
     FbxMesh* triangle(const std::string& records) { return read<FbxMesh>(kTriangle + records); }
 
-    /// The texture coordinates of layer 0 for records that hold one element; null when it is left out.
+    /// The texture coordinates of layer 0 for records that hold one element; null when it is dropped.
     FbxLayerElementUV* uvs(const std::string& mapping, const std::string& reference, const std::string& data) {
         FbxMesh* mesh = triangle(element("LayerElementUV", mapping, reference, data));
         return mesh->GetLayer(0) ? mesh->GetLayer(0)->GetUVs() : nullptr;

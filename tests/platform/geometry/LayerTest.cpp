@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Layers and elements made by hosts, and who owns them.
+// Layers and elements created by hosts, and their owners.
 #include "GeometryFixture.h"
 
 #include <stdexcept>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Points and polygons from the records of files, sound and unsound.
+// Points and polygons from the records of files, valid and invalid.
 #include "GeometryFixture.h"
 
 #include <cmath>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// NURBS from records, sound and unsound.
+// NURBS from records, valid and invalid.
 #include "geometry/NurbsReading.h"
 
 #include <fbxsdk/FbxTrimNurbsSurface.h>

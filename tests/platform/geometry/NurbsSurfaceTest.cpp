@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// NURBS made by hosts, and trimmed surfaces put together of them.
+// NURBS created by hosts, and trimmed surfaces composed of them.
 #include <fbxsdk/FbxNurbs.h>
 #include <fbxsdk/FbxTrimNurbsSurface.h>
 

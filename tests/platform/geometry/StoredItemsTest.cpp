@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Arrays of which the items stay with their source as long as only values are asked for. The source of these tests
-// spoils what is released, so that nobody reads it unnoticed.
+// Arrays whose items stay with their source as long as only values are read. The source of these tests
+// overwrites what is released, so that reading it does not go unnoticed.
 #include <fbxsdk/FbxPlainArray.h>
 
 #include <algorithm>
@@ -25,7 +25,7 @@ namespace {
 using testing::ElementsAre;
 
 struct Calls {
-    std::size_t spoiled = 0; ///< bytes that are not there now
+    std::size_t spoiled = 0; ///< released bytes
     int restored = 0;
     bool gone = false;
 };
@@ -194,7 +194,7 @@ TEST(StoredItems, ComeIntoMemoryForAPointerAndStayAsTheyAreChanged) {
     PlainArray<int> array;
     keep(array, upTo(kMany), calls);
     for (int i = 0; i < kMany; ++i) {
-        ASSERT_EQ(array.value(i), i); // gives up most of them
+        ASSERT_EQ(array.value(i), i); // releases most of them
     }
 
     int* const items = array.data();

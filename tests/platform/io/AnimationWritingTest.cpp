@@ -85,7 +85,7 @@ TEST_P(AnimationWriting, KeepsEveryInterpolationAndTangent) {
     set(2, Def::eInterpolationCubic, Def::eTangentUser, 4.0F, -2.0F);
     set(3, Def::eInterpolationCubic, Def::eTangentAuto);
     set(4, Def::eInterpolationCubic, Def::eTangentBreak, 1.5F, 2.5F);
-    // Weights that files hold exactly: they count them in steps of 1/9999.
+    // Weights that files hold exactly: they are stored in steps of 1/9999.
     set(5, Def::eInterpolationCubic, Def::eTangentUser, 1.0F, 1.0F, Def::eWeightedAll, 6000 / 9999.0F, 2000 / 9999.0F);
     set(6, Def::eInterpolationCubic, Def::eTangentTCB, 0.25F, -0.5F);
     set(7, Def::eInterpolationCubic, Def::eTangentAuto);
@@ -127,10 +127,10 @@ TEST_P(AnimationWriting, KeepsTheShapeOfClampedAndBiasedTangents) {
     }
 }
 
-/// Keys with a kind of attributes each, picked by the seed so that all kinds come to stand next to each other.
+/// Keys with a kind of attributes each, chosen by the seed so that all kinds occur next to each other.
 void addMixedKeys(FbxAnimCurve* curve, std::uint32_t seed) {
     namespace KeyFlag = detail::KeyFlag;
-    // Weights that files hold exactly: they count them in steps of 1/9999.
+    // Weights that files hold exactly: they are stored in steps of 1/9999.
     constexpr float kThird = 3333 / 9999.0F;
     const detail::KeyAttributes kKinds[] = {
         {.flags = KeyFlag::linear},
@@ -223,7 +223,7 @@ TEST_P(AnimationWriting, LeavesOutWhatWasMadeAndNeverKeyed) {
     light->Intensity.Set(100.0);
     FbxAnimCurve* curve = light->Intensity.GetCurve(layer, /*pCreate=*/true);
     ASSERT_NE(curve, nullptr);
-    curve->SetValue(1.0F); // not the property's value: nobody asked for it
+    curve->SetValue(1.0F); // not the property's value: it is not requested
 
     const std::string file = write();
     FbxScene* copy = read();
@@ -241,7 +241,7 @@ TEST_P(AnimationWriting, LeavesOutACurveNodeThatSaysWhatItsPropertySays) {
     node->LclTranslation.Set(FbxDouble3(1, 2, 3));
     animate::constants(node->LclTranslation, layer, 1, 2, 3);
     node->LclScaling.Set(FbxDouble3(1, 2, 3));
-    animate::constants(node->LclScaling, layer, 4, 2, 3); // this one is the value that counts
+    animate::constants(node->LclScaling, layer, 4, 2, 3); // this one is the value that is used
 
     FbxScene* copy = writeAndRead();
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Caches are there completely or not at all: faults of the medium, and samples that cannot be stored.
+// Caches are written completely or not at all: faults of the medium, and samples that cannot be stored.
 #include <array>
 #include <cerrno>
 #include <cmath>
@@ -62,7 +62,7 @@ protected:
     [[nodiscard]] static std::string dataName() {
         return isMax() ? "ball.pc2" : (GetParam() == Kind::eWide ? "ball.mcx" : "ball.mc");
     }
-    /// The file that the cache is named after.
+    /// The file after which the cache is named.
     [[nodiscard]] static std::string mainName() { return isMax() ? "ball.pc2" : "ball.xml"; }
 
     void make() {
@@ -84,7 +84,7 @@ protected:
         return isMax() ? cache->Write(static_cast<unsigned int>(frame), points.data(), &status)
                        : cache->Write(0, time, points.data(), static_cast<unsigned int>(points.size() / 3), &status);
     }
-    /// Everything, whatever comes of it before the end, like writers that ask only then.
+    /// Writes everything regardless of errors, like writers that check only at the end.
     bool writeAll(unsigned int pointCount = 2) {
         if (!open(pointCount))
             return false;
@@ -104,7 +104,7 @@ protected:
         return all;
     }
     /// Both names are those of the same cache.
-    /// What fails later names the file; who opens a cache knows it.
+    /// Later faults name the file; the caller that opens a cache already has its name.
     void expectReason(const std::string& reason) const {
         const std::string message = status.GetErrorString();
         EXPECT_TRUE(status.Error());
@@ -124,7 +124,7 @@ protected:
 
 INSTANTIATE_TEST_SUITE_P(Formats, CacheWriting, testing::Values(Kind::eNarrow, Kind::eWide, Kind::eMax), nameOf);
 
-/// Limits the size of files while it lives.
+/// Limits the size of files for its lifetime.
 class SizeLimit {
 public:
     explicit SizeLimit(rlim_t bytes) {
@@ -152,7 +152,7 @@ private:
 TEST_P(CacheWriting, ShowsNothingUnderItsNameBeforeItIsClosed) {
     writeOldFiles();
     const Contents before = contents();
-    constexpr unsigned int kPoints = 50000; // more than is gathered before it is written
+    constexpr unsigned int kPoints = 50000; // more than is buffered before it is written
     ASSERT_TRUE(open(kPoints)) << status.GetErrorString();
     for (int frame = 0; frame < 3; ++frame)
         EXPECT_TRUE(write(frame)) << status.GetErrorString();
@@ -546,7 +546,7 @@ TEST_P(CacheWriting, RefusesMorePointsThanItsSizesCanSay) {
         ASSERT_TRUE(open());
         FbxTime time;
         const unsigned int count = GetParam() == Kind::eWide ? 0x80000000U : 0x06000000U;
-        EXPECT_FALSE(cache->Write(0, time, points.data(), count, &status)); // refused before a point is looked at
+        EXPECT_FALSE(cache->Write(0, time, points.data(), count, &status)); // refused before a point is read
         expectReason(GetParam() == Kind::eWide ? "can count" : "2 GiB");
         EXPECT_FALSE(cache->CloseFile(&status));
     }

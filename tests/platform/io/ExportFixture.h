@@ -54,7 +54,7 @@ protected:
         return folder.read(name);
     }
 
-    /// A new scene with what the file holds.
+    /// A new scene with the content of the file.
     fbxsdk::FbxScene* read(const std::string& name = "out.fbx") {
         using fbxsdk::FbxImporter;
         FbxImporter* importer = FbxImporter::Create(manager, "");

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What an exporter is told before it writes: file, format, version.
+// The settings of an exporter before it writes: file, format, version.
 #include <fbxsdk/FbxExporter.h>
 
 #include <climits>

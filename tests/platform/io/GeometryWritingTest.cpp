@@ -136,7 +136,7 @@ TEST_P(GeometryWriting, KeepsNormalsOfEveryMapping) {
 
 /// The fourth numbers of vectors are 1 in versions that do not write them.
 TEST_P(GeometryWriting, KeepsTheFourthNumbersOfNormalsTangentsAndBinormals) {
-    constexpr int kManyCorners = 4000; // so many that their array is fetched in portions
+    constexpr int kManyCorners = 4000; // enough for their array to be fetched in portions
     const bool written = detail::findVersion(GetParam().version)->fourthNumbers;
     FbxMesh* mesh = addMesh();
     FbxLayer* layer = mesh->GetLayer(mesh->CreateLayer());

@@ -21,7 +21,7 @@ class FbxIOPluginRegistryTest : public SceneFixture {
 protected:
     [[nodiscard]] const FbxIOPluginRegistry& registry() const { return *manager->GetIOPluginRegistry(); }
 
-    /// The first writer whose description has the word; -1 without one. This is how hosts look for their encoding.
+    /// The first writer whose description contains the word; -1 without one. Hosts look for their encoding this way.
     [[nodiscard]] int firstWriterWith(const char* word) const {
         for (int i = 0; i < registry().GetWriterFormatCount(); ++i) {
             if (registry().WriterIsFBX(i) && FbxString(registry().GetWriterFormatDescription(i)).Find(word) >= 0)

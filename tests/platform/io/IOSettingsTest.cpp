@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Import and export options: which paths there are, and what happens to others.
+// Import and export options: the known paths, and the result for others.
 #include <fbxsdk/FbxIOSettings.h>
 
 #include <string>

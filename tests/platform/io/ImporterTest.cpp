@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From a file to a scene: what is known before the import, what the import does, and what is said when it fails.
+// From a file to a scene: what is known before the import, what the import does, and the error when it fails.
 #include <fbxsdk/FbxImporter.h>
 
 #include <climits>
@@ -85,7 +85,7 @@ protected:
     }
     FbxImporter* openedText(const char* text) { return opened(folder.write("scene.fbx", text)); }
 
-    /// The importer must refuse the file, with the code and a sentence that names the file and has the words.
+    /// The importer must refuse the file, with the code and a message that names the file and contains the words.
     void expectRefused(const std::string& file, FbxStatus::EStatusCode code, const char* words) {
         FbxImporter* importer = FbxImporter::Create(manager, "");
         EXPECT_FALSE(importer->Initialize(file.c_str())) << file;
@@ -300,7 +300,7 @@ Connections:  {
 
     ASSERT_NE(settings.GetCameraProducerTop(), nullptr);
     EXPECT_STREQ(settings.GetCameraProducerTop()->GetNode(0)->GetName(), "Producer Top");
-    EXPECT_EQ(settings.GetCameraProducerLeft(), nullptr); // that one hangs in the tree
+    EXPECT_EQ(settings.GetCameraProducerLeft(), nullptr); // that one is in the tree
     EXPECT_EQ(scene->GetRootNode()->GetChildCount(), 1);
 }
 

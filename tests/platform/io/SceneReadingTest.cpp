@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// From documents to scenes: classes, properties, connections and animation as files state them, and files that state
-// what cannot be.
+// From documents to scenes: classes, properties, connections and animation as files state them, and files that are
+// inconsistent.
 #include <memory>
 #include <string>
 
@@ -71,7 +71,7 @@ const char* const kStack = R"(AnimationStack: 900, "AnimStack::take", "" { }
 AnimationLayer: 901, "AnimLayer::base", "" { }
 )";
 
-// What files state.
+// Valid files.
 
 constexpr const char* kTwoProperties = R"(P: "Lcl Translation", "Lcl Translation", "", "A",1,2,3
         P: "gain", "double", "Number", "U",0.5
@@ -192,7 +192,7 @@ TEST_F(SceneReadingTest, TakesTheFilesOwnDefaultsBeforeTheBuiltInOnes) {
     child(0)->GetTransformationInheritType(inherit);
     EXPECT_EQ(inherit, FbxTransform::eInheritRSrs);
     EXPECT_EQ(child(0)->LclScaling.Get(), FbxDouble3(2, 2, 2));
-    EXPECT_EQ(child(1)->LclScaling.Get(), FbxDouble3(1, 1, 1)); // the built-in default, said against the file's
+    EXPECT_EQ(child(1)->LclScaling.Get(), FbxDouble3(1, 1, 1)); // the built-in default, stated against the file's
 }
 
 TEST_F(SceneReadingTest, TakesTheLastOfTheFilesOwnDefaultsForEveryObject) {
@@ -399,7 +399,7 @@ TEST_F(SceneReadingTest, AddsASecondFileToTheScene) {
     EXPECT_STREQ(child(1)->GetName(), "b");
 }
 
-// What cannot be.
+// Inconsistent files.
 
 TEST_F(SceneReadingTest, BreaksCyclesOfNodes) {
     read(model(1, "a") + model(2, "b") + model(3, "c"), "C: \"OO\",1,2\nC: \"OO\",2,3\nC: \"OO\",3,1\nC: \"OO\",1,1");

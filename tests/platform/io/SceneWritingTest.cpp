@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a scene holds, a file of any version gives back: nodes, attributes, materials, settings.
+// The content of a scene is read back from a file of any version: nodes, attributes, materials, settings.
 #include "io/SceneWriting.h"
 
 #include <limits>
@@ -176,7 +176,7 @@ TEST_P(SceneWriting, TellsNodesOfOneNameApart) {
     addNode("same")->LclTranslation.Set(FbxDouble3(1, 0, 0));
     addNode("same")->LclTranslation.Set(FbxDouble3(2, 0, 0));
     addNode("same_ncl1_1")->LclTranslation.Set(FbxDouble3(3, 0, 0));
-    addNode("Scene")->LclTranslation.Set(FbxDouble3(4, 0, 0)); // what old files call the root
+    addNode("Scene")->LclTranslation.Set(FbxDouble3(4, 0, 0)); // the name of the root in old files
 
     FbxScene* copy = writeAndRead();
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Which records stand where, and how their values are stored: as in the files of the applications, because simple
+// The order of records, and how their values are stored: as in the files of the applications, because simple
 // readers rely on both.
 #include "io/SceneWriting.h"
 
@@ -44,7 +44,7 @@ constexpr Layout kOldText{"FBX201000", 1}, kOldBinary{"FBX201000", 0}, kNewText{
 
 class WrittenRecords : public exporting::ExportFixture {
 protected:
-    /// Writes the scene and cuts the file into its records.
+    /// Writes the scene and parses the file into its records.
     const Record& records(const Layout& layout) {
         write(layout);
         FbxStatus status;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Managers: they own everything, share nothing, and go in any state.
+// Managers: they own everything, share nothing, and can be destroyed in any state.
 #include <string>
 #include <vector>
 
@@ -69,7 +69,7 @@ TEST(FbxManagerTest, TakesObjectsInEveryStateAlong) {
 
     manager->Destroy();
 
-    SUCCEED(); // a sanitizer would complain
+    SUCCEED(); // a sanitizer would report it
 }
 
 TEST(FbxManagerTest, TakesTenThousandConnectedObjectsAlong) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Objects: names, classes, connections, and who dies with whom.
+// Objects: names, classes, connections, and which objects are destroyed together.
 #include <string>
 #include <vector>
 
@@ -399,7 +399,7 @@ TEST_F(FbxObjectTest, TakesAChainOfAHundredThousandAlong) {
 
     top->Destroy(true);
 
-    SUCCEED(); // neither the stack nor a sanitizer complains
+    SUCCEED(); // neither a stack overflow nor a sanitizer report
 }
 
 TEST_F(FbxObjectTest, TakesAWholeSceneAlongWhenTheSceneIsASource) {
@@ -411,7 +411,7 @@ TEST_F(FbxObjectTest, TakesAWholeSceneAlongWhenTheSceneIsASource) {
 
     owner->Destroy(true);
 
-    manager->Destroy(); // anything of the scene left over would now touch the freed scene
+    manager->Destroy(); // leftover data of the scene would now access the freed scene
     manager = FbxManager::Create();
     scene = nullptr;
 }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What a property of one type gives to, and takes from, a caller of another.
+// Conversions between a property of one type and a caller's variable of another.
 #include <cmath>
 #include <cstdint>
 #include <limits>
@@ -24,7 +24,7 @@ protected:
         return FbxProperty::Create(FbxObject::Create(manager, ""), type, "value");
     }
 
-    /// A property of the type that a value was written to; the writing must succeed.
+    /// A property of the type to which a value was written; the writing must succeed.
     template <class T>
     FbxProperty holding(const FbxDataType& type, const T& value) {
         FbxProperty made = property(type);
@@ -143,7 +143,7 @@ TEST_F(PropertyConversionTest, ReadsVectorsByComponents) {
 
     EXPECT_EQ(three.Get<FbxDouble2>(), FbxDouble2(1.5, 2));
     EXPECT_EQ(three.Get<FbxDouble4>(), FbxDouble4(1.5, 2, 3, 0));
-    EXPECT_EQ(three.Get<FbxColor>(), FbxColor(1.5, 2, 3, 1)); // the alpha that a colour has by itself
+    EXPECT_EQ(three.Get<FbxColor>(), FbxColor(1.5, 2, 3, 1)); // the default alpha of a colour
     EXPECT_EQ(three.Get<FbxVector4>(), FbxVector4(1.5, 2, 3, 1));
     EXPECT_EQ(three.Get<FbxDouble>(), 1.5);
     EXPECT_EQ(three.Get<FbxInt>(), 1);

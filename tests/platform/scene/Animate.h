@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Stacks, layers and linear keys in one line each.
+// Helpers for stacks, layers and linear keys.
 #pragma once
 
 #include <initializer_list>
@@ -54,7 +54,7 @@ inline FbxAnimCurve* keys(FbxProperty property, FbxAnimLayer* layer, const char*
     return curve;
 }
 
-/// A curve node whose three channels stand at the values, without curves.
+/// A curve node whose three channels have these values, without curves.
 inline FbxAnimCurveNode* constants(FbxProperty property, FbxAnimLayer* layer, double x, double y, double z) {
     FbxAnimCurveNode* node = property.GetCurveNode(layer, /*pCreate=*/true);
     if (!node) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Axis systems as values: every combination that a file can state, and what is none.
+// Axis systems as values: every combination that a file can state, and invalid ones.
 #include <algorithm>
 #include <array>
 #include <climits>

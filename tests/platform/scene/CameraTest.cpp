@@ -112,7 +112,7 @@ TEST_F(FbxCameraTest, ComputesTheLensOverTheWidthInTheOtherModes) {
         camera->SetApertureMode(mode);
         EXPECT_DOUBLE_EQ(camera->ComputeFocalLength(45.0), 43.45575721102746) << mode;
         EXPECT_DOUBLE_EQ(camera->ComputeFieldOfView(43.45575721102746), 45.0) << mode;
-        // A file has 43.45584 with this width, of which it keeps five decimals.
+        // A file has 43.45584 with this width, of which it stores five decimals.
         EXPECT_NEAR(camera->ComputeFocalLength(45.0), 43.45584, 43.45584 * 0.000005 / 1.41732) << mode;
     }
 }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Settings of a whole scene: the defaults of new ones, and what the accessors make of any number a file may hold.
+// Settings of a whole scene: the defaults of new ones, and the accessors' results for any number in a file.
 #include <climits>
 #include <cmath>
 

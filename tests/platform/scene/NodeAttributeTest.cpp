@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Attributes that are only shown: nulls, markers, bones, groups, and those of unknown kind.
+// Attributes for display: nulls, markers, bones, groups, and those of unknown kind.
 #include <fbxsdk/FbxNodeAttribute.h>
 
 #include <fbxsdk/FbxCachedEffect.h>

@@ -101,7 +101,7 @@ TEST_F(NodeEvaluationTest, IgnoresOrderAndOuterRotationsThatServeLimitsOnly) {
 }
 
 TEST_F(NodeEvaluationTest, IgnoresLimits) {
-    // kept: files carry limits that their own values exceed; they bind the hand, not the value.
+    // kept: files have limits that their own values exceed; they limit interaction, not the value.
     FbxNode* node = addNode();
     node->FindProperty("TranslationActive").Set(true);
     node->FindProperty("TranslationMaxX").Set(true);
@@ -167,7 +167,7 @@ TEST_F(NodeEvaluationTest, TurnsTheScalingOffsetAlong) {
     EXPECT_NEAR(origin[1], 5.0, kMatrixTolerance);
 }
 
-// Inherit types. The parent is scaled by (2, 1, 1) and turned by nothing; the child is turned by 90° about Z.
+// Inherit types. The parent is scaled by (2, 1, 1) without rotation; the child is rotated by 90° about Z.
 
 class InheritTypeTest : public NodeEvaluationTest {
 protected:
@@ -219,8 +219,9 @@ TEST_F(InheritTypeTest, RrsKeepsTheScalingThatTheParentInherits) {
     expectColumns({0, 15, 0}, {-5, 0, 0}, {100, 0, 0}, 5);
 }
 
-// The grandparent's scaling of (5, 1, 1) reaches the child through its parent. The child is turned by 90° about Z:
-// taken before its turn, what is handed on stretches along the world's x, so the child's own y, which points there.
+// The grandparent's scaling of (5, 1, 1) reaches the child through its parent. The child is rotated by 90° about Z:
+// applied before its rotation, what it inherits stretches along the world's x, so the child's own y, which points
+// there.
 TEST_F(InheritTypeTest, RrsCompensatesBeforeTheNodesOwnTurn) {
     build(FbxTransform::eInheritRrs);
     FbxNode* top = addNode("top");
@@ -251,7 +252,7 @@ TEST_F(InheritTypeTest, RrsSurvivesAParentWithoutExtent) {
             EXPECT_FALSE(std::isnan(child->EvaluateGlobalTransform().Get(row, column)));
 }
 
-// Random trees against the formulas, written down a second time with plain matrices.
+// Random trees against the formulas, implemented a second time with plain matrices.
 
 struct PlainNode {
     FbxVector4 t, r, s{1, 1, 1}, pre, post, rotationOffset, rotationPivot, scalingOffset, scalingPivot;
@@ -280,7 +281,7 @@ PlainNode randomNode(SeededRandom& random) {
     node.order = order.letters;
     node.t = random.vector(-50, 50);
     node.r = random.vector(-200, 200);
-    // Away from zero: an inverse is taken.
+    // Not close to zero: an inverse is computed.
     for (int i = 0; i < 3; ++i)
         node.s[i] = random.real(0.3, 2.5) * (random.chance(5) ? -1.0 : 1.0);
     node.active = !random.chance(4);
@@ -407,7 +408,7 @@ TEST_F(NodeEvaluationTest, GivesTheSameInAnyOrderOfTimesAndNodes) {
     for (int frame = 0; frame < 24; ++frame)
         for (std::size_t node = 0; node < 5; ++node)
             first.push_back(evaluate(node, frame));
-    scene->GetRootNode()->LclTranslation.Set(FbxDouble3(0, 0, 0)); // forgets what was computed
+    scene->GetRootNode()->LclTranslation.Set(FbxDouble3(0, 0, 0)); // discards what was computed
 
     SeededRandom random(5);
     for (int i = 0; i < 2000; ++i) {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Transform data of nodes: what is set, where it is stored, and what files may say that makes no sense.
+// Transform data of nodes: what is set, where it is stored, and invalid numbers in files.
 #include <climits>
 #include <cmath>
 #include <limits>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What nodes have: properties, attributes, targets, materials and a shading mode.
+// The data of nodes: properties, attributes, targets, materials and a shading mode.
 #include <climits>
 
 #include <fbxsdk/FbxCamera.h>

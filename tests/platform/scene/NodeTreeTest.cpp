@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The tree of nodes: order, moves, cycles and depths that no stack holds.
+// The tree of nodes: order, moves, cycles, and depths that exceed the call stack.
 #include <climits>
 #include <random>
 #include <string>
@@ -29,7 +29,7 @@ protected:
         return names;
     }
 
-    /// Whether the node's children and its source nodes are the same, in the same order, and know their parent.
+    /// Whether the node's children and its source nodes are the same, in the same order, and have it as their parent.
     static void expectSound(FbxNode* parent) {
         ASSERT_EQ(parent->GetChildCount(), parent->GetSrcObjectCount<FbxNode>());
         for (int i = 0; i < parent->GetChildCount(); ++i) {

@@ -48,7 +48,7 @@ Matrix scaling(const Vector& v) {
     return m;
 }
 
-/// The turn about one axis, counter-clockwise when looking against it.
+/// The rotation about one axis, counter-clockwise when looking against it.
 inline Matrix turn(int axis, double degrees) {
     const double angle = degrees * 3.14159265358979323846 / 180.0;
     const auto u = static_cast<std::size_t>((axis + 1) % 3), v = static_cast<std::size_t>((axis + 2) % 3);
@@ -59,7 +59,7 @@ inline Matrix turn(int axis, double degrees) {
     return m;
 }
 
-/// Turns in the order in which the letters stand, the first one first.
+/// Rotations in the order of the letters, the first one first.
 template <class Vector>
 Matrix rotation(const Vector& degrees, const std::string& order = "XYZ") {
     Matrix m;

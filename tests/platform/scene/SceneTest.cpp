@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Scenes: what each has from the start, its list of nodes, its current stack, and its end.
+// Scenes: their initial content, the list of nodes, the current stack, and their destruction.
 #include <string>
 
 #include <fbxsdk/FbxAnimStack.h>

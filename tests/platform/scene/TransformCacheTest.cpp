@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The cache of global transforms: it never shows, asks each ancestor once per time, and stays within its budget.
+// The cache of global transforms: not observable, one evaluation of each ancestor per time, and within its budget.
 #include <algorithm>
 #include <cstddef>
 #include <cstdint>
@@ -131,7 +131,7 @@ TEST_F(CacheInvalidationTest, AsksAnAncestorOncePerTime) {
 
     EXPECT_EQ(parent->evaluation().cache.used(), 2U);
     EXPECT_EQ(child->evaluation().cache.used(), 2U);
-    EXPECT_EQ(leaf->evaluation().cache.places(), 0U); // nobody asks a leaf's transform for another node
+    EXPECT_EQ(leaf->evaluation().cache.places(), 0U); // a leaf's transform is not needed for another node
 }
 
 TEST_F(CacheInvalidationTest, KeepsOneTransformForAllTimesWhereNothingMoves) {
@@ -193,12 +193,12 @@ TEST_F(CacheInvalidationTest, StaysWithinItsBudgetHoweverManyNodesAndTimes) {
         globalX(node, FbxTime(i));
     EXPECT_LE(budget.places(), detail::EvaluationBudget::kMostPlaces);
 
-    // After that everything is as in a scene that was never asked.
+    // After that the result is that of a scene without a cache.
     EXPECT_EQ(globalX(node, seconds(1)), 11.0);
     EXPECT_EQ(globalX(child, seconds(0)), 10.0);
 }
 
-/// A chain whose first node moves, asked node after node for the times of a list.
+/// A chain whose first node is animated, evaluated node after node for the times of a list.
 class LongChainTest : public NodeEvaluationFixture {
 protected:
     LongChainTest() {
@@ -233,7 +233,7 @@ TEST_F(LongChainTest, FindsEveryTimeOfTheParentWhateverTheirOrder) {
         readAll(times);
         for (std::size_t i = 0; i + 1 < chain.size(); ++i)
             EXPECT_EQ(chain[i]->evaluation().cache.used(), times.size()) << "order " << order << ", node " << i;
-        chain.front()->LclRotation.Set(FbxDouble3(0, 0, order)); // all anew
+        chain.front()->LclRotation.Set(FbxDouble3(0, 0, order)); // all recomputed
         chain.front()->LclRotation.Set(FbxDouble3(0, 0, 0));
     }
 }

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The property templates of files, line by line as they stand in ASCII files of version 7: name, type, second type,
-// flags, values. What the tables of the classes are held against.
+// The property templates of files, line by line as in ASCII files of version 7: name, type, second type,
+// flags, values. The tables of the classes are compared with them.
 #pragma once
 
 #include <string_view>

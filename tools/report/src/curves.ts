@@ -1,13 +1,13 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The curves of the node that is selected, one plot for each unit; a line stands at the frame that is shown.
+// The curves of the node that is selected, one plot for each unit; a line marks the frame that is shown.
 
 import uPlot from "uplot";
 import type { Store } from "./store.ts";
 import { make, number } from "./text.ts";
 
-/** Plots in their order, and the channels that stand in each. */
+/** Plots in their order, and the channels of each. */
 const PLOTS: { title: string; unit: string; channels: [channel: string, label: string][] }[] = [
   { title: "Focal length", unit: "mm", channels: [["focalLength", "focal length"]] },
   { title: "Field of view", unit: "°", channels: [["fieldOfViewX", "horizontal"], ["fieldOfViewY", "vertical"]] },

@@ -96,7 +96,7 @@ function bytesOf(base64: string): ArrayBuffer {
   return bytes.buffer;
 }
 
-/** One file of the report. Its frames are counted from 0; `frameAt` gives the numbers that people know. */
+/** One file of the report. Its frames are counted from 0; `frameAt` gives the numbers for display. */
 export class Shot {
   readonly data: ShotData;
   private readonly bytes: ArrayBuffer;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// All lines of the scene in one object that is filled anew for each frame: files have thousands of nulls and bones.
+// All lines of the scene in one object that is refilled for each frame: files have thousands of nulls and bones.
 
 import { BufferGeometry, Color, DynamicDrawUsage, Float32BufferAttribute, LineBasicMaterial, LineSegments, Vector3 } from "three";
 import type { Matrix4 } from "three";

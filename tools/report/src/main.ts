@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The page: what stands where, and the keys.
+// The page: its layout, and the keys.
 
 import { Curves } from "./curves.ts";
 import { shotsOf } from "./data.ts";

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// All nodes as they hang below each other; the one that is picked is the one whose values and curves are shown.
+// The hierarchy of all nodes; the values and curves of the selected one are shown.
 
 import type { Store } from "./store.ts";
 import { make, shown } from "./text.ts";

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What is shown at the moment. The parts of the page change it, and are told when another part did.
+// The current selection and frame. The parts of the page change it, and are notified when another part did.
 
 import type { NodeData, Shot } from "./data.ts";
 

@@ -51,7 +51,7 @@ export class Surfaces {
     });
   }
 
-  /** Colours for the theme; the one that is selected stands out. */
+  /** Colours for the theme; the selected one is highlighted. */
   paint(base: Color, selectedColour: Color, selected: number, wires: boolean): void {
     for (const { node, mesh } of this.surfaces) {
       mesh.material.color.copy(node === selected ? selectedColour : base);

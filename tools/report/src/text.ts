@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Words and numbers as people see them. Names may hold anything: they only ever become the text of elements, and what
+// Words and numbers for display. Names may contain anything: they only ever become the text of elements, and what
 // cannot be seen, or turns the direction of writing, is spelt out.
 
 const UNSEEN = /[\u0000-\u001f\u007f-\u009f\u200b-\u200f\u2028-\u202e\u2060-\u2069\ufeff]/gu;

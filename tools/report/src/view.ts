@@ -223,7 +223,7 @@ export class View {
     return Math.min(((node.size ?? 1) * scale) / 2, this.radius * 0.06);
   }
 
-  /** The line from a bone to what it hangs on. */
+  /** The line from a bone to its parent. */
   private drawJoint(parent: number, to: Vector3, frame: number, add: (m: Matrix4, p: Triple[], c: Color) => void): void {
     const above = this.store.node(parent);
     if (!above) return;

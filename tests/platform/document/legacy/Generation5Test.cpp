@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Files before 6.0: everything stands inside top-level Models.
+// Files before 6.0: everything is inside top-level Models.
 #include "platform/document/DocumentFromText.h"
 
 #include "document/DocumentBuilder.h"
@@ -76,7 +76,7 @@ TEST(Generation5, TheCurrentTakeGivesThePoseOtherwise) {
                                                   transform(3, 4) + "} } }");
     const DocumentObject* model = objectNamed(*document, "Model", "a");
     EXPECT_EQ(numbersOf(model, "Lcl Translation"), (Numbers{3, 0, 0}));
-    // The other take still says what is different in it.
+    // The other take still has its differences.
     EXPECT_EQ(numbersOf(objectNamed(*document, "AnimationCurveNode", "T"), "d|X"), (Numbers{1}));
 }
 
@@ -280,7 +280,7 @@ TEST(Generation5, SettingsCamerasAreUnconnectedViews) {
 TEST(Generation5, ReadsBareNamesOfOldBinaries) {
     auto tree = std::make_unique<RecordTree>();
     tree->version = 3000;
-    DocumentBuilder maker(std::move(tree), 3000); // only to make records with
+    DocumentBuilder maker(std::move(tree), 3000); // only for creating records
     ChildAppender top(maker.tree().root);
     Record& parent = maker.newRecord("Model", maker.keep({Value::ofText("a::b")}));
     ChildAppender(parent).add(maker.newRecord("Children", maker.keep({Value::ofText("Box01")})));

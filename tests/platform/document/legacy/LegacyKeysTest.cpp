@@ -92,7 +92,7 @@ TEST(LegacyKeys, ReadsAutomaticKeys) {
     EXPECT_EQ(attributeOf("U,p,1,2,n,n").data[0], 0.0F);
 }
 
-// What the 7.5 files of the same scenes say of such keys: the tangents of the first and the last one are clamped.
+// The 7.5 files of the same scenes mark such keys so: the tangents of the first and the last one are clamped.
 TEST(LegacyKeys, FlattensAutomaticKeysAtBothEnds) {
     constexpr std::uint32_t kAuto = KeyFlag::cubic | KeyFlag::tangentAuto,
                             kFlat = kAuto | KeyFlag::genericClampProgressive;

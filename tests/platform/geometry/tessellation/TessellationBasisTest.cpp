@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Samples of one direction: shares of control points, places, seams.
+// Samples of one direction: weights of control points, parameters, seams.
 #include "geometry/tessellation/TessellationBasis.h"
 
 #include <cmath>

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Points, normals and shares of surfaces that are known in closed form.
+// Points, normals and weights of surfaces that are known in closed form.
 #include "geometry/tessellation/TessellationGrid.h"
 
 #include <limits>
@@ -69,7 +69,7 @@ TEST_F(TessellationGridOf, AClampedCircleKeepsBothEndsOfItsSeam) {
     surface->SetStep(2, 1);
     const auto grid = gridOf(*surface);
     ASSERT_TRUE(grid);
-    // Its last control point is a point of its own that happens to lie on the first.
+    // Its last control point is a separate point that happens to coincide with the first.
     EXPECT_FALSE(grid->u().joined);
     EXPECT_EQ(grid->pointCount(), 9 * 2);
 }
@@ -91,7 +91,7 @@ TEST_F(TessellationGridOf, APeriodicDirectionSharesThePointsOfItsSeam) {
     EXPECT_EQ(grid->u().sampleCount(), 25);
     EXPECT_EQ(grid->pointCount(), 24 * 2);
     EXPECT_EQ(grid->pointOf(24, 1), grid->pointOf(0, 1));
-    // The blend at a knot of neighbours at 60 degrees: (1 + 4 + 1) / 6 with cosines 1/2, 1, 1/2.
+    // The blend at a knot of adjacent points at 60 degrees: (1 + 4 + 1) / 6 with cosines 1/2, 1, 1/2.
     expectNear(pointAt(*grid, 0, 0), FbxVector4(5.0 / 6.0 * 0.5, 5.0 / 6.0 * std::sqrt(0.75), 0.0), 1e-12);
     expectNear(normalAt(*grid, 0, 0), normalAt(*grid, 24, 0), 1e-12);
 }
