@@ -61,6 +61,15 @@ struct ChannelSet {
         }
     }
 
+    /// The same for channels as their constructor leaves them.
+    static void initNew(Array& channels) {
+        for (std::size_t i = 0; i < kCount; ++i) {
+            if (kRows[i].defaultValue != TnFbxChannel::kDefaultChannelValue) {
+                channels[i].setValue(kRows[i].defaultValue);
+            }
+        }
+    }
+
     // kept: 0 for every channel, whatever its default
     static void clear(Array& channels) {
         for (TnFbxChannel& channel : channels) {

@@ -52,9 +52,9 @@ void store(const detail::Vector3& v, float& x, float& y, float& z) {
 
 } // namespace
 
-TnFbxCamera::TnFbxCamera() { initCamera(); }
+TnFbxCamera::TnFbxCamera() : mProperties() { Channels::initNew(mChannels); }
 
-TnFbxCamera::~TnFbxCamera() { deleteCamera(); }
+TnFbxCamera::~TnFbxCamera() = default;
 
 // kept: nothing of the transform is copied, nor the name
 TnFbxCamera& TnFbxCamera::operator=(const TnFbxCamera& other) {

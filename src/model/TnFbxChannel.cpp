@@ -54,9 +54,9 @@ bool areAllEqual(const std::vector<float>& values) {
 
 } // namespace
 
-TnFbxChannel::TnFbxChannel() { initChannel(); }
+TnFbxChannel::TnFbxChannel() : mAnimated(false), mCount(0), mValue(kDefaultChannelValue) {}
 
-TnFbxChannel::~TnFbxChannel() { deleteChannel(); }
+TnFbxChannel::~TnFbxChannel() = default;
 
 TnFbxChannel& TnFbxChannel::operator=(const TnFbxChannel& other) {
     if (this != &other) {

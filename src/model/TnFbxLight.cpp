@@ -25,9 +25,9 @@ using Channels = detail::ChannelSet<kLightChannels>;
 
 } // namespace
 
-TnFbxLight::TnFbxLight() { initLight(); }
+TnFbxLight::TnFbxLight() : mProperties() { Channels::initNew(mChannels); }
 
-TnFbxLight::~TnFbxLight() { deleteLight(); }
+TnFbxLight::~TnFbxLight() = default;
 
 // kept: nothing of the transform is copied, nor the name
 TnFbxLight& TnFbxLight::operator=(const TnFbxLight& other) {

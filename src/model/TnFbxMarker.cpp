@@ -23,9 +23,9 @@ using Channels = detail::ChannelSet<kMarkerChannels>;
 
 } // namespace
 
-TnFbxMarker::TnFbxMarker() { initMarker(); }
+TnFbxMarker::TnFbxMarker() : mProperties() { Channels::initNew(mChannels); }
 
-TnFbxMarker::~TnFbxMarker() { deleteMarker(); }
+TnFbxMarker::~TnFbxMarker() = default;
 
 // kept: nothing of the transform is copied, nor the name
 TnFbxMarker& TnFbxMarker::operator=(const TnFbxMarker& other) {

@@ -50,7 +50,7 @@ bool getVector(const SharedArray<Vector>& array, int index, float& x, float& y, 
 
 TnFbxMesh::TnFbxMesh() { initMesh(); }
 
-TnFbxMesh::~TnFbxMesh() { deleteMesh(); }
+TnFbxMesh::~TnFbxMesh() = default;
 
 // kept: nothing of the transform is copied, nor the name
 TnFbxMesh& TnFbxMesh::operator=(const TnFbxMesh& other) {

@@ -8,7 +8,7 @@ namespace Tarnell::Fbx {
 
 TnFbxNull::TnFbxNull() { initNull(); }
 
-TnFbxNull::~TnFbxNull() { deleteNull(); }
+TnFbxNull::~TnFbxNull() = default;
 
 // kept: nothing of the transform is copied, nor the name
 TnFbxNull& TnFbxNull::operator=(const TnFbxNull& other) {

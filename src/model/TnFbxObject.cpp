@@ -4,9 +4,9 @@
 
 namespace Tarnell::Fbx {
 
-TnFbxObject::TnFbxObject() { initObject(); }
+TnFbxObject::TnFbxObject() = default;
 
-TnFbxObject::~TnFbxObject() { deleteObject(); }
+TnFbxObject::~TnFbxObject() = default;
 
 TnFbxObject& TnFbxObject::operator=(const TnFbxObject& other) {
     if (this != &other) {

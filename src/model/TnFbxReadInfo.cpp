@@ -6,7 +6,7 @@ namespace Tarnell::Fbx {
 
 TnFbxReadInfo::TnFbxReadInfo() { initReadInfo(); }
 
-TnFbxReadInfo::~TnFbxReadInfo() { deleteReadInfo(); }
+TnFbxReadInfo::~TnFbxReadInfo() = default;
 
 TnFbxReadInfo& TnFbxReadInfo::operator=(const TnFbxReadInfo& other) {
     if (this != &other) {

@@ -6,9 +6,9 @@
 
 namespace Tarnell::Fbx {
 
-TnFbxTime::TnFbxTime() { initTime(); }
+TnFbxTime::TnFbxTime() : mFrame(kDefaultTimeFrame), mStartFrame(0), mEndFrame(0), mFrameRate(kDefaultTimeFrameRate) {}
 
-TnFbxTime::~TnFbxTime() { deleteTime(); }
+TnFbxTime::~TnFbxTime() = default;
 
 bool TnFbxTime::initTime() { return setTime(kDefaultTimeFrame, 0, 0, kDefaultTimeFrameRate); }
 

@@ -34,9 +34,9 @@ using Channels = detail::ChannelSet<kTransformChannels>;
 
 } // namespace
 
-TnFbxTransform::TnFbxTransform() { initTransform(); }
+TnFbxTransform::TnFbxTransform() : mProperties() { Channels::initNew(mChannels); }
 
-TnFbxTransform::~TnFbxTransform() { deleteTransform(); }
+TnFbxTransform::~TnFbxTransform() = default;
 
 // kept: the name is not copied
 TnFbxTransform& TnFbxTransform::operator=(const TnFbxTransform& other) {

@@ -6,7 +6,7 @@ namespace Tarnell::Fbx {
 
 TnFbxWriteInfo::TnFbxWriteInfo() { initWriteInfo(); }
 
-TnFbxWriteInfo::~TnFbxWriteInfo() { deleteWriteInfo(); }
+TnFbxWriteInfo::~TnFbxWriteInfo() = default;
 
 // kept: the compatibility version is not copied
 TnFbxWriteInfo& TnFbxWriteInfo::operator=(const TnFbxWriteInfo& other) {

@@ -2,8 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 #pragma once
 
-#include <map>
-#include <string>
+#include <cstdint>
 
 #include <fbxsdk/FbxObject.h>
 
@@ -55,7 +54,7 @@ public:
     [[nodiscard]] bool GetBoolProp(const char* pName, bool pDefValue) const;
 
 private:
-    std::map<std::string, bool> mValues; ///< every known path
+    std::uint32_t mValues; ///< a bit for each known path
 };
 
 FBXSDK_NAMESPACE_END

@@ -76,6 +76,9 @@ bool settledFacts(int file, struct stat& facts) {
     return true;
 }
 
+/// Memory of files up to this size comes from the heap, which takes less time than mapping pages.
+constexpr std::size_t kSmallFile = std::size_t{1} << 16;
+
 /// Memory that takes no pages until it is written to.
 std::span<char> reserve(std::size_t size) {
     void* const memory =
@@ -113,8 +116,9 @@ FileBytes::~FileBytes() {
     if (mFile >= 0)
         ::close(mFile);
     if (!mMemory.empty()) {
-        allow(mMemory); // the next owner of the pages
-        ::munmap(mMemory.data(), mMemory.size());
+        allow(mMemory); // the next owner of the memory
+        if (!mHeap)
+            ::munmap(mMemory.data(), mMemory.size());
     }
 }
 
@@ -134,11 +138,8 @@ std::shared_ptr<const FileBytes> FileBytes::open(const std::string& fileName, Fb
     const std::shared_ptr<FileBytes> opened(new FileBytes); // first, so that nothing can fail after the reservation
     opened->mName = fileName;
     std::size_t size = isPipe ? kMostPipeBytes : static_cast<std::size_t>(facts.st_size);
-    if (size != 0) {
-        opened->mMemory = reserve(size);
-        if (opened->mMemory.empty())
-            return refuse(fileName, errno, status);
-    }
+    if (size != 0 && !opened->reserveMemory(size))
+        return refuse(fileName, errno, status);
     if (isPipe) {
         if (const int error = readPipe(file.number(), opened->mMemory, size); error != 0)
             return refuse(fileName, error, status);
@@ -152,7 +153,27 @@ std::shared_ptr<const FileBytes> FileBytes::open(const std::string& fileName, Fb
     }
     opened->mSize = size;
     forbid(isPipe ? opened->tail() : opened->mMemory);
-    return opened;
+    const bool isRead = isPipe || size > kSmallFile || faultToStatus(status, [&] {
+                            opened->fetchAll();
+                            return true;
+                        });
+    return isRead ? opened : nullptr;
+}
+
+bool FileBytes::reserveMemory(std::size_t size) {
+    if (size <= kSmallFile) {
+        mHeap = std::make_unique_for_overwrite<char[]>(size);
+        mMemory = {mHeap.get(), size};
+    } else {
+        mMemory = reserve(size);
+    }
+    return !mMemory.empty();
+}
+
+void FileBytes::fetchAll() {
+    fetch(bytes());
+    requireUnchanged();
+    ::close(std::exchange(mFile, -1));
 }
 
 std::span<const char> FileBytes::tail() const {

@@ -52,6 +52,8 @@ public:
     /// All bytes at their addresses. Only those that were fetched may be accessed.
     [[nodiscard]] std::span<const char> bytes() const { return mMemory.first(mSize); }
 
+    /// Whether all bytes are in memory, so that changes of the file have no effect.
+    [[nodiscard]] bool isComplete() const { return mFile < 0; }
     /// Whether the bytes are part of these.
     [[nodiscard]] bool contains(std::span<const char> part) const;
 
@@ -66,6 +68,9 @@ public:
 private:
     FileBytes() = default;
 
+    [[nodiscard]] bool reserveMemory(std::size_t size);
+    /// Reads everything and closes the file.
+    void fetchAll();
     void copy(std::span<const char> part, char* destination) const;
     /// The memory of a pipe's content.
     [[nodiscard]] std::span<const char> tail() const;
@@ -73,6 +78,7 @@ private:
     std::string mName;
     int mFile = -1; ///< none once all bytes are in memory
     timespec mModified{};
+    std::unique_ptr<char[]> mHeap; ///< the memory of a small file
     std::span<char> mMemory;
     std::size_t mSize = 0;
 };
@@ -82,7 +88,7 @@ private:
 class ReadAhead {
 public:
     ReadAhead(std::span<const char> bytes, const FileBytes* file)
-        : mBytes(bytes), mFile(file), mEnd(file ? 0 : bytes.size()) {}
+        : mBytes(bytes), mFile(file), mEnd(file && !file->isComplete() ? 0 : bytes.size()) {}
 
     /// To be called before these bytes are accessed, which must be part of the whole. Throws FileFault.
     void need(std::size_t offset, std::size_t size) {

@@ -52,6 +52,9 @@ ConnectionList::~ConnectionList() = default;
 std::size_t ConnectionList::size() const { return mRemoval ? mRemoval->places.size() : mPoints.size(); }
 
 void ConnectionList::append(ConnectionPoint& point) {
+    constexpr std::size_t kUsual = 4;
+    if (mPoints.capacity() == 0)
+        mPoints.reserve(kUsual);
     mPoints.push_back(&point);
     if (!mRemoval)
         return;

@@ -208,10 +208,15 @@ void joinSceneOf(const FbxObject& member, FbxObject& object) {
     FbxScene* const scene = member.data().scene;
     Membership& membership = *member.data().membership;
     ConnectionPoint& scenePlug = membership.scene.data().plug;
-    std::vector<FbxObject*> pending{&object};
-    while (!pending.empty()) {
-        FbxObject* each = pending.back();
+    std::vector<FbxObject*> pending;
+    const auto next = [&]() -> FbxObject* {
+        if (pending.empty())
+            return nullptr;
+        FbxObject* const last = pending.back();
         pending.pop_back();
+        return last;
+    };
+    for (FbxObject* each = &object; each; each = next()) {
         // A scene is a member of itself only.
         if (each->GetScene())
             continue;
