@@ -39,21 +39,22 @@ public:
 
     [[nodiscard]] virtual int count() const = 0;
     [[nodiscard]] virtual std::size_t itemSize() const = 0; ///< in memory
-    /// Prepares to show items. False when they can only be read, or are corrupt.
+    /// Prepares to show items. False when they can only be read, are corrupt, or none.
     [[nodiscard]] virtual bool show() = 0;
     /// Reads all items into the memory, shown or not. False when they are corrupt.
     [[nodiscard]] virtual bool read(void* pItems) = 0;
 
-    /// The packed bytes of an item that exists, until the next call. Items must be shown.
-    [[nodiscard]] const char* at(int pIndex, std::size_t pItemBytes) {
-        if (static_cast<unsigned>(pIndex - mWindowStart) >= static_cast<unsigned>(mWindowSize))
-            moveWindow(pIndex);
+    [[nodiscard]] bool hasInWindow(int pIndex) const {
+        return static_cast<unsigned>(pIndex - mWindowStart) < static_cast<unsigned>(mWindowSize);
+    }
+    /// The packed bytes of an item in the window, until the window is moved.
+    [[nodiscard]] const char* at(int pIndex, std::size_t pItemBytes) const {
         return mWindow + static_cast<std::size_t>(pIndex - mWindowStart) * pItemBytes;
     }
-
-protected:
+    /// Moves the window to an item that exists. Items must be shown.
     virtual void moveWindow(int pIndex) = 0;
 
+protected:
     const char* mWindow = nullptr; ///< the first item of the window
     int mWindowStart = 0;
     int mWindowSize = 0;
@@ -68,25 +69,25 @@ public:
     ~PlainStorage();
 
     [[nodiscard]] int count() const {
-        if (mCount == kUnread)
+        if (isPending())
             open();
         return mCount;
     }
-    [[nodiscard]] bool contains(int pIndex) const { return pIndex >= 0 && pIndex < count(); }
+    [[nodiscard]] bool contains(int pIndex) const {
+        return static_cast<unsigned>(pIndex) < static_cast<unsigned>(mCount) ||
+               (isPending() && pIndex >= 0 && pIndex < count());
+    }
     /// Whether the items are still to be read from the source.
-    [[nodiscard]] bool isPending() const { return mCount == kUnread; }
+    [[nodiscard]] bool isPending() const { return mCount == 0 && mSource; }
     /// Replaces all items by those of the source, which are read on demand.
     void setSource(std::unique_ptr<ItemSource> pSource);
 
 protected:
     [[nodiscard]] void* items() const { return mItems; }
-    /// Whether the source shows the items; they are not in memory then.
-    [[nodiscard]] bool isShown() const {
-        if (mSource && mCount == kUnread)
-            open();
-        return mSource != nullptr;
-    }
-    [[nodiscard]] ItemSource& source() const { return *mSource; }
+    /// Null when the items are in memory, which they never are as long as there is a source.
+    [[nodiscard]] ItemSource* source() const { return mSource.get(); }
+    /// Brings an item into the window of the source; false when all items are in memory now.
+    bool reach(int pIndex) const;
     void ensureInMemory() const {
         if (mSource)
             readSource();
@@ -102,13 +103,11 @@ protected:
     void closeSlots(int pIndex, int pCount, std::size_t pItemSize);
 
 private:
-    static constexpr int kUnread = -1;
-
     void open() const;
     void readSource() const;
     void allocate(int pCapacity, std::size_t pItemSize) const;
 
-    // Reading the items from the source does not change the array's value.
+    // That items come out of the source is no change of the array. Of a source that nobody has asked the count is 0.
     mutable std::unique_ptr<ItemSource> mSource;
     mutable void* mItems = nullptr;
     mutable int mCapacity = 0;
@@ -127,7 +126,7 @@ public:
         return static_cast<T*>(items());
     }
     [[nodiscard]] T value(int pIndex) const {
-        return isShown() ? shownItem(pIndex) : static_cast<const T*>(items())[pIndex];
+        return source() ? sourceItem(pIndex) : static_cast<const T*>(items())[pIndex];
     }
     [[nodiscard]] T& operator[](int pIndex) const { return data()[pIndex]; }
     [[nodiscard]] T* begin() const { return data(); }
@@ -167,9 +166,11 @@ public:
 private:
     static constexpr std::size_t kItemBytes = sizeof(T); // NOLINT(bugprone-sizeof-expression): items can be pointers
 
-    T shownItem(int pIndex) const {
+    T sourceItem(int pIndex) const {
+        if (!source()->hasInWindow(pIndex) && !reach(pIndex))
+            return static_cast<const T*>(items())[pIndex];
         T item{};
-        std::memcpy(static_cast<void*>(&item), source().at(pIndex, kStoredBytes<T>), kStoredBytes<T>);
+        std::memcpy(static_cast<void*>(&item), source()->at(pIndex, kStoredBytes<T>), kStoredBytes<T>);
         return item;
     }
 };

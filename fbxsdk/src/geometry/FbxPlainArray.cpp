@@ -35,7 +35,14 @@ PlainStorage::~PlainStorage() { std::free(mItems); }
 void PlainStorage::setSource(std::unique_ptr<ItemSource> pSource) {
     clearItems();
     mSource = std::move(pSource);
-    mCount = kUnread;
+}
+
+bool PlainStorage::reach(int pIndex) const {
+    if (isPending())
+        open();
+    if (mSource)
+        mSource->moveWindow(pIndex);
+    return mSource != nullptr;
 }
 
 void PlainStorage::open() const {

@@ -20,10 +20,11 @@ public:
 
     [[nodiscard]] int count() const override { return mCount; }
 
+    void moveWindow(int index) override;
+
 protected:
     [[nodiscard]] bool hasBytes() const { return mBytes != nullptr; }
     void setBytes(std::unique_ptr<StoredBytes> bytes) { mBytes = std::move(bytes); }
-    void moveWindow(int index) override;
 
 private:
     void releaseUpTo(int end);
@@ -40,10 +41,12 @@ public:
     StoredItems(std::unique_ptr<StoredBytes> bytes, int count) : StoredItems(count) { setBytes(std::move(bytes)); }
 
     [[nodiscard]] std::size_t itemSize() const override { return sizeof(Item); }
-    [[nodiscard]] bool show() override { return hasBytes(); }
+    [[nodiscard]] bool show() override { return hasBytes() && count() > 0; }
     [[nodiscard]] bool read(void* items) override {
         auto* const to = static_cast<Item*>(items);
         for (int i = 0; i < count(); ++i) {
+            if (!hasInWindow(i))
+                moveWindow(i);
             Item item{};
             std::memcpy(static_cast<void*>(&item), at(i, kStoredBytes<Item>), kStoredBytes<Item>);
             to[i] = item;

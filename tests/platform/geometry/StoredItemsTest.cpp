@@ -259,9 +259,9 @@ public:
         return mSound;
     }
 
-private:
     void moveWindow(int) override { FAIL() << "nothing is shown"; }
 
+private:
     Calls& mCalls;
     bool mSound;
     bool mAsked = false;
