@@ -18,9 +18,12 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <fbxsdk/extensions/Threads.h>
+
 #include "container/FileOperations.h"
 #include "container/PageMemory.h"
 #include "container/ReadLimits.h"
+#include "core/Parallel.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -203,7 +206,25 @@ void FileBytes::fetch(std::span<const char> part) const {
     const std::span<char> place = mMemory.subspan(static_cast<std::size_t>(part.data() - mMemory.data()), part.size());
     preferLargePages(place);
     allow(place);
-    copy(part, place.data());
+    if (!copyInPieces(part, place.data())) {
+        copy(part, place.data());
+    }
+}
+
+bool FileBytes::copyInPieces(std::span<const char> part, char* destination) const {
+    constexpr std::size_t kPiece = std::size_t{1} << 23;
+    if (part.size() < 2 * kPiece || extensions::maximumThreads() == 1) {
+        return false;
+    }
+    try {
+        forEachInParallel((part.size() + kPiece - 1) / kPiece, [&](std::size_t i) {
+            const std::size_t from = i * kPiece;
+            copy(part.subspan(from, std::min(kPiece, part.size() - from)), destination + from);
+        });
+    } catch (const FileFault&) {
+        return false; // of several faults nobody knows which was the first one
+    }
+    return true;
 }
 
 void FileBytes::read(std::span<const char> part, char* destination) const {

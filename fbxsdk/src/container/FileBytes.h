@@ -72,6 +72,8 @@ private:
     /// Reads everything and closes the file.
     void fetchAll();
     void copy(std::span<const char> part, char* destination) const;
+    /// The same on several threads. False when only one is allowed, the part is small, or a piece cannot be read.
+    bool copyInPieces(std::span<const char> part, char* destination) const;
     /// The memory of a pipe's content.
     [[nodiscard]] std::span<const char> tail() const;
 

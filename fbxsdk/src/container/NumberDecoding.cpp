@@ -4,18 +4,22 @@
 // Stored arrays become numbers: inflated, swapped, converted, or parsed from text.
 #include "container/NumberDecoding.h"
 
+#include <atomic>
 #include <bit>
 #include <charconv>
 #include <cstring>
 #include <memory>
 #include <type_traits>
+#include <vector>
 
 #include "container/ByteOrder.h"
 #include "container/FileBytes.h"
 #include "container/NumberConversion.h"
+#include "container/NumberRun.h"
 #include "container/NumberText.h"
 #include "container/PageMemory.h"
 #include "container/ZlibStream.h"
+#include "core/Parallel.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -163,22 +167,40 @@ inline const char* nextValue(const char* text, const char* end) {
     return commaAlone ? text + 1 : skipSeparators(text, end);
 }
 
+/// Numbers from the first one on.
 template <class Number>
-bool parseText(const StoredArray& array, std::span<Number> destination) {
-    const char* text = array.bytes.data();
-    const char* const end = text + array.bytes.size();
+bool parseNumbers(const char* text, const char* end, bool bitPatterns, std::span<Number> destination) {
     for (Number& number : destination) {
-        const char* next = array.bitPatterns ? nullptr : parseFast(text, end, number);
+        const char* next = bitPatterns ? nullptr : parseFast(text, end, number);
         if (next == nullptr) {
             next = tokenEnd(text, end);
             if (next == text) {
                 return false;
             }
-            number = parseElement<Number>(text, next, array.bitPatterns);
+            number = parseElement<Number>(text, next, bitPatterns);
         }
         text = nextValue(next, end);
     }
     return true;
+}
+
+template <class Number>
+bool parseText(const StoredArray& array, std::span<Number> destination) {
+    const char* const end = array.bytes.data() + array.bytes.size();
+    const std::vector<NumberPiece> pieces =
+        destination.size() == array.count ? piecesOfRun(array.bytes, array.count) : std::vector<NumberPiece>();
+    if (pieces.empty()) {
+        return parseNumbers(array.bytes.data(), end, array.bitPatterns, destination);
+    }
+    std::atomic<bool> sound{true};
+    forEachInParallel(pieces.size(), [&](std::size_t i) {
+        const NumberPiece& piece = pieces[i];
+        if (!parseNumbers(skipSeparators(piece.text, end), end, array.bitPatterns,
+                          destination.subspan(piece.first, piece.count))) {
+            sound = false;
+        }
+    });
+    return sound;
 }
 
 } // namespace
