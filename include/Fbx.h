@@ -99,10 +99,11 @@ public:
 /// TARNELL_FBX_THREADS in the environment.
 TARNELL_FBX_API int maximumThreads();
 
-/// 0 means as many threads as the machine has; less counts as 1. The arrays of a large mesh are then deflated on
-/// several threads, which start and end within the call that uses them; concurrent calls share them. Reading uses the
-/// caller's thread alone. What is written is the same for every number. Any thread may call this at any time; a call in
-/// progress may keep the previous number.
+/// 0 is as many threads as the machine has; less counts as 1. The arrays of large meshes are then deflated and inflated
+/// on several threads, and long lists of ASCII files parsed. Threads start and end within the call that uses them; only
+/// while a scene stays loaded, as that of an `FbxFaithful`, they may continue to inflate for a short time after it.
+/// Concurrent calls share them. What is read and written is the same for every number. Any thread may call this at any
+/// time; a call in progress may keep the previous number.
 TARNELL_FBX_API void setMaximumThreads(int count);
 
 } // namespace Tarnell::Fbx

@@ -26,6 +26,7 @@
 #include "TnFbxNull.h"
 #include "TnFbxReadInfo.h"
 #include "TnFbxTransform.h"
+#include "support/StripMesh.h"
 #include "support/TemporaryFolder.h"
 #include "support/WritingBuilders.h"
 
@@ -187,6 +188,29 @@ TEST_P(ReadingInstancesWithoutMemory, GivesAllOrFails) {
 INSTANTIATE_TEST_SUITE_P(BothFidelities, ReadingInstancesWithoutMemory,
                          testing::Values(kFbxFidelityCompatible, kFbxFidelityFaithful),
                          [](const auto& param) { return fidelityName(param.param); });
+
+/// Allocations that other threads make are counted in the order in which they happen to come.
+class ReadingOnThreadsWithoutMemory : public testing::TestWithParam<bool> {
+protected:
+    ReadingOnThreadsWithoutMemory() { setMaximumThreads(3); }
+    ~ReadingOnThreadsWithoutMemory() override { setMaximumThreads(1); }
+};
+
+TEST_P(ReadingOnThreadsWithoutMemory, GivesAllOrFails) {
+    const support::TemporaryFolder folder;
+    TnFbxReadInfo info;
+    info.setFileName(folder.file("strip.fbx"));
+    info.setAnimationStackName("Take 001");
+    info.setTransformPoints(false);
+    const bool ascii = GetParam(); // where every mesh is parsed again for every allocation: one will do
+    const std::vector<int> lengths =
+        ascii ? std::vector<int>{test::kLongStrip} : std::vector<int>{test::kLongStrip, 2000, 2000};
+    test::writeStrips(info.getFileName(), lengths, ascii);
+    tryPositions([&] { return read(&Fbx::getMeshes, info); });
+}
+
+INSTANTIATE_TEST_SUITE_P(Encodings, ReadingOnThreadsWithoutMemory, testing::Bool(),
+                         [](const auto& param) { return std::string(param.param ? "Ascii" : "Binary"); });
 
 class WritingWithoutMemory : public testing::TestWithParam<std::tuple<int, EFbxFidelity>> {};
 

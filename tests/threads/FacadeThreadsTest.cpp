@@ -4,6 +4,7 @@
 // Concurrent reads and writes of hosts, each with objects of its own.
 #include "support/FacadeReads.h"
 #include "support/SceneBuilders.h"
+#include "support/StripMesh.h"
 #include "support/TemporaryFolder.h"
 #include "support/WritingBuilders.h"
 
@@ -11,6 +12,10 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <fstream>
+#include <iterator>
+#include <memory>
+#include <set>
 #include <string>
 #include <thread>
 #include <vector>
@@ -79,27 +84,6 @@ TEST(FacadeThreads, WriteFilesOfTheirOwnAtTheSameTime) {
     }
 }
 
-/// Squares in a row, enough of them for their arrays to be written concurrently.
-void fillStrip(TnFbxMesh& mesh, int squares) {
-    ASSERT_TRUE(mesh.allocateGeometryData(squares, 2 * squares + 2, 4 * squares));
-    for (int i = 0; i < mesh.getNumberOfControlPoints(); ++i) {
-        mesh.setControlPoint(i, static_cast<float>(i / 2), static_cast<float>(i % 2), 0.0f);
-    }
-    for (int square = 0; square < squares; ++square) {
-        mesh.setPolygonVertexSize(square, 4);
-        for (int corner = 0; corner < 4; ++corner) {
-            const int at = 4 * square + corner;
-            mesh.setPointIndex(at, 2 * square + (corner == 1 ? 2 : corner == 2 ? 3 : corner / 3));
-            mesh.setNormal(at, 0.0f, 0.0f, 1.0f);
-            mesh.setUV(at, static_cast<float>(square), static_cast<float>(corner));
-            mesh.setColour(at, 0.25f, 0.5f, 0.75f, 1.0f);
-        }
-    }
-    mesh.setValidNormals(true);
-    mesh.setValidUVs(true);
-    mesh.setValidColours(true);
-}
-
 struct ThreadsScope {
     explicit ThreadsScope(int count) { setMaximumThreads(count); }
     ThreadsScope(const ThreadsScope&) = delete;
@@ -115,38 +99,130 @@ TEST(FacadeThreads, WorkOnTheCallersThreadUnlessToldOtherwise) {
     EXPECT_EQ(maximumThreads(), static_cast<int>(std::max(1U, std::thread::hardware_concurrency())));
 }
 
+/// What a read gives, or fails for, to the bit.
+std::string meshesOf(const std::string& fileName, EFbxFidelity fidelity = kFbxFidelityCompatible) {
+    TnFbxReadInfo info = test::localRead(fileName);
+    info.setFidelity(fidelity);
+    info.setAnimationStackName("Take 001");
+    TnFbxMesh* meshes = nullptr;
+    int count = 0;
+    const bool read = Fbx().getMeshes(info, &meshes, count);
+    const std::unique_ptr<TnFbxMesh[]> owner(meshes);
+    std::string answer = (read ? "read " : "failed ") + lastError();
+    for (const std::string& warning : lastWarnings()) {
+        answer += "; " + warning;
+    }
+    const auto add = [&answer](auto... numbers) {
+        for (const float number : {static_cast<float>(numbers)...}) {
+            answer.append(static_cast<const char*>(static_cast<const void*>(&number)), sizeof(number));
+        }
+    };
+    for (int i = 0; meshes != nullptr && i < count; ++i) {
+        const TnFbxMesh& mesh = meshes[i];
+        float x = 0.0f, y = 0.0f, z = 0.0f, w = 0.0f;
+        for (int point = 0; point < mesh.getNumberOfControlPoints(); ++point) {
+            mesh.getControlPoint(point, x, y, z);
+            add(x, y, z);
+        }
+        for (int at = 0; at < mesh.getNumberOfPolygonVertices(); ++at) {
+            mesh.getNormal(at, x, y, z);
+            add(mesh.getPointIndex(at), x, y, z);
+            mesh.getUV(at, x, y);
+            mesh.getColour(at, x, y, z, w);
+            add(x, y, z, w);
+        }
+        add(mesh.getValidNormals(), mesh.getValidUVs(), mesh.getValidColours());
+    }
+    return answer;
+}
+
+std::string contentOf(const std::string& fileName) {
+    std::ifstream file(fileName, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
+class FacadeReads : public testing::TestWithParam<bool> {
+protected:
+    // Of the third mesh on, arrays are inflated before it is its turn.
+    FacadeReads() { test::writeStrips(mFile, {test::kLongStrip, 200, 5000, 3, test::kLongStrip, 4000}, GetParam()); }
+    ~FacadeReads() override { setMaximumThreads(1); }
+
+    TemporaryFolder mFolder;
+    std::string mFile = mFolder.file("strip.fbx");
+};
+
+TEST_P(FacadeReads, GiveTheSameForAnyNumberOfThreads) {
+    for (const EFbxFidelity fidelity : {kFbxFidelityCompatible, kFbxFidelityFaithful}) {
+        setMaximumThreads(1);
+        const std::string alone = meshesOf(mFile, fidelity);
+        EXPECT_GT(alone.size(), std::size_t{4 * test::kLongStrip}) << alone;
+        for (const int threads : {2, 8}) {
+            setMaximumThreads(threads);
+            EXPECT_TRUE(meshesOf(mFile, fidelity) == alone) << threads;
+        }
+    }
+}
+
+TEST_P(FacadeReads, GiveTheSameAtTheSameTime) {
+    const std::string alone = meshesOf(mFile);
+    setMaximumThreads(3);
+    onAllThreads([&](int) {
+        for (int round = 0; round < 2; ++round) {
+            EXPECT_TRUE(meshesOf(mFile) == alone);
+        }
+    });
+}
+
+TEST_P(FacadeReads, MeetTheSameFaultsInADamagedFile) {
+    const std::string sound = contentOf(mFile);
+    std::set<std::string> answers;
+    for (const std::size_t tenth : {2U, 4U, 6U, 8U}) {
+        std::string bytes = sound;
+        bytes.replace(sound.size() / 10 * tenth, 8, "\"x,,.-e:");
+        const std::string damaged = mFolder.write("damaged.fbx", bytes);
+        setMaximumThreads(1);
+        const std::string alone = meshesOf(damaged);
+        answers.insert(alone);
+        setMaximumThreads(3);
+        EXPECT_TRUE(meshesOf(damaged) == alone);
+    }
+    EXPECT_GT(answers.size(), 1U);
+    EXPECT_EQ(answers.count(meshesOf(mFile)), 0U);
+}
+
+INSTANTIATE_TEST_SUITE_P(Encodings, FacadeReads, testing::Bool(),
+                         [](const auto& suite) { return std::string(suite.param ? "Ascii" : "Binary"); });
+
 TEST(FacadeThreads, WriteTheArraysOfALargeMeshAtTheSameTime) {
     constexpr int kSquares = 20'000;
-    const ThreadsScope threads(3);
     const TemporaryFolder folder;
+    test::writeStrips(folder.file("alone.fbx"), {kSquares}, /*ascii*/ false);
+    const ThreadsScope threads(3);
+    test::writeStrips(folder.file("together.fbx"), {kSquares}, /*ascii*/ false);
     TnFbxMesh mesh;
-    mesh.setName("strip");
-    fillStrip(mesh, kSquares);
-    TnFbxWriteInfo info;
-    info.setFileName(folder.file("strip.fbx"));
-    info.setAnimationStackName("walk");
-    info.setAnimateMeshVertices(false);
-    EXPECT_TRUE(Fbx().writeFile(info, {}, {}, {}, {}, {&mesh})) << lastError();
+    test::fillStrip(mesh, kSquares);
 
-    FacadeRead<TnFbxMesh> meshes(folder.file("strip.fbx"));
+    FacadeRead<TnFbxMesh> meshes(folder.file("together.fbx"));
     const TnFbxMesh& back = meshes["strip"];
     ASSERT_EQ(back.getNumberOfPolygonVertices(), 4 * kSquares);
     for (int at = 0; at < 4 * kSquares; ++at) {
-        float x = 0.0f, y = 0.0f, z = 0.0f, w = 0.0f;
+        float x = 0.0f, y = 0.0f, z = 0.0f, w = 0.0f, wanted = 0.0f;
         ASSERT_EQ(back.getPointIndex(at), mesh.getPointIndex(at));
+        ASSERT_TRUE(mesh.getNormal(at, wanted, y, z));
         ASSERT_TRUE(back.getNormal(at, x, y, z));
-        ASSERT_EQ(z, 1.0f);
+        ASSERT_EQ(x, wanted);
         ASSERT_TRUE(back.getUV(at, x, y));
         ASSERT_EQ(x, static_cast<float>(at / 4));
         ASSERT_EQ(y, static_cast<float>(at % 4));
         ASSERT_TRUE(back.getColour(at, x, y, z, w));
         ASSERT_EQ(y, 0.5f);
     }
+    EXPECT_EQ(meshesOf(folder.file("together.fbx")), meshesOf(folder.file("alone.fbx")));
 }
 
 TEST(FacadeThreads, ChangeCopiesOfOneMesh) {
     TnFbxMesh mesh;
-    fillStrip(mesh, 100);
+    test::fillStrip(mesh, 100);
     std::vector<TnFbxMesh> copies(kThreads, mesh);
 
     onAllThreads([&copies](int thread) {

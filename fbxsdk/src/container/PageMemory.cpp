@@ -25,25 +25,36 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-void releasePages(std::span<const char> bytes) {
-    static const auto kPageSize = static_cast<std::uintptr_t>(::sysconf(_SC_PAGESIZE));
+namespace {
+
+/// The whole pages of that size within the bytes.
+std::span<char> wholePages(std::span<const char> bytes, std::uintptr_t pageSize) {
     const auto address = reinterpret_cast<std::uintptr_t>(bytes.data());
-    const std::uintptr_t first = (address + kPageSize - 1) / kPageSize * kPageSize;
-    const std::uintptr_t end = (address + bytes.size()) / kPageSize * kPageSize;
-    if (first < end) {
-        // The interface takes no constant memory. If the call is refused the pages stay.
-        ::madvise(const_cast<char*>(bytes.data() + (first - address)), end - first, MADV_DONTNEED);
-    }
+    const std::uintptr_t first = (address + pageSize - 1) / pageSize * pageSize;
+    const std::uintptr_t end = (address + bytes.size()) / pageSize * pageSize;
+    // The interface takes no constant memory.
+    return first < end ? std::span(const_cast<char*>(bytes.data() + (first - address)), end - first)
+                       : std::span<char>();
 }
 
+void release(std::span<char> pages) {
+    if (!pages.empty()) // if the call is refused the pages stay
+        ::madvise(pages.data(), pages.size(), MADV_DONTNEED);
+}
+
+} // namespace
+
+void releasePages(std::span<const char> bytes) {
+    static const auto kPageSize = static_cast<std::uintptr_t>(::sysconf(_SC_PAGESIZE));
+    release(wholePages(bytes, kPageSize));
+}
+
+void releaseLargePages(std::span<const char> bytes) { release(wholePages(bytes, kLargePage)); }
+
 void preferLargePages(std::span<char> bytes) {
-    constexpr std::uintptr_t kLargePage = std::uintptr_t{1} << 21;
-    const auto address = reinterpret_cast<std::uintptr_t>(bytes.data());
-    const std::uintptr_t first = (address + kLargePage - 1) / kLargePage * kLargePage;
-    const std::uintptr_t end = (address + bytes.size()) / kLargePage * kLargePage;
-    if (first < end) {
-        ::madvise(bytes.data() + (first - address), end - first, MADV_HUGEPAGE);
-    }
+    const std::span<char> pages = wholePages(bytes, kLargePage);
+    if (!pages.empty())
+        ::madvise(pages.data(), pages.size(), MADV_HUGEPAGE);
 }
 
 #ifdef TARNELL_ADDRESS_SANITIZER

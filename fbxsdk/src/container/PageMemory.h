@@ -4,6 +4,7 @@
 // Memory that is released page by page, before its owner is done with all of it.
 #pragma once
 
+#include <cstddef>
 #include <span>
 
 #include <fbxsdk/FbxArch.h>
@@ -11,9 +12,14 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+/// Size of a large page in bytes.
+inline constexpr std::size_t kLargePage = std::size_t{1} << 21;
+
 /// Releases the pages of a mapping that lie wholly within the bytes. Read again, they come from the file that is
 /// mapped there, or as zeros where there is none.
 void releasePages(std::span<const char> bytes);
+/// The same for large pages: the system would have to split one that is released in part.
+void releaseLargePages(std::span<const char> bytes);
 
 /// Uses large pages for memory that will soon be filled completely, where the system has some: most of the time of
 /// small ones is spent getting them one by one.

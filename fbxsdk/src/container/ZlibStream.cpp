@@ -29,21 +29,37 @@ constexpr std::size_t kMostKeptBytes = std::size_t{1} << 18;
 
 namespace {
 
-/// A thread's decompressor and cache. Curves of one rig have their keys at the same times, each with an array of its
-/// own: short arrays that were inflated recently are copied.
+class Decompressor {
+public:
+    bool inflate(std::span<const char> stream, std::span<char> destination) {
+        if (!mMemory) {
+            mMemory.reset(libdeflate_alloc_decompressor());
+        }
+        if (!mMemory) {
+            throw std::bad_alloc(); // not an error of the stream
+        }
+        // Without a variable for the actual size the library requires the exact one.
+        return libdeflate_zlib_decompress(mMemory.get(), stream.data(), stream.size(), destination.data(),
+                                          destination.size(), nullptr) == LIBDEFLATE_SUCCESS;
+    }
+
+private:
+    std::unique_ptr<libdeflate_decompressor, decltype(&libdeflate_free_decompressor)> mMemory{
+        nullptr, &libdeflate_free_decompressor};
+};
+
+/// A thread's decompressor and cache for short arrays. Curves of one rig have their keys at the same times, each with
+/// an array of its own: short arrays that were inflated recently are copied.
 class Inflater {
 public:
     bool inflate(std::span<const char> stream, std::span<char> destination) {
-        if (destination.size() > kMostRemembered || stream.size() > kMostRemembered) {
-            return inflateAnew(stream, destination);
-        }
         Kept& kept = find(stream, destination.size());
         kept.lastUse = ++mUses;
         if (kept.size != 0) {
             std::memcpy(destination.data(), kept.bytes.data() + stream.size(), destination.size());
             return true;
         }
-        if (!inflateAnew(stream, destination)) {
+        if (!mDecompressor.inflate(stream, destination)) {
             return false;
         }
         remember(kept, stream, destination);
@@ -51,8 +67,6 @@ public:
     }
 
 private:
-    static constexpr std::size_t kMostRemembered = std::size_t{1} << 13;
-
     struct Kept {
         std::vector<char> bytes;    ///< the stream, followed by its inflated content
         std::size_t streamSize = 0; ///< size of the stream
@@ -83,20 +97,7 @@ private:
         kept.size = content.size();
     }
 
-    bool inflateAnew(std::span<const char> stream, std::span<char> destination) {
-        if (!mDecompressor) {
-            mDecompressor.reset(libdeflate_alloc_decompressor());
-        }
-        if (!mDecompressor) {
-            throw std::bad_alloc(); // not an error of the stream
-        }
-        // Without a variable for the actual size the library requires the exact one.
-        return libdeflate_zlib_decompress(mDecompressor.get(), stream.data(), stream.size(), destination.data(),
-                                          destination.size(), nullptr) == LIBDEFLATE_SUCCESS;
-    }
-
-    std::unique_ptr<libdeflate_decompressor, decltype(&libdeflate_free_decompressor)> mDecompressor{
-        nullptr, &libdeflate_free_decompressor};
+    Decompressor mDecompressor;
     std::array<Kept, 8> mKept;
     std::uint64_t mUses = 0;
 };
@@ -104,6 +105,12 @@ private:
 } // namespace
 
 bool inflateExactly(std::span<const char> stream, std::span<char> destination) {
+    constexpr std::size_t kMostRemembered = std::size_t{1} << 13;
+    if (destination.size() > kMostRemembered || stream.size() > kMostRemembered) {
+        // No object with the lifetime of the thread: the threads that inflate large arrays are short-lived, and the C
+        // library aborts the process when there is no memory to register a destructor with a thread.
+        return Decompressor().inflate(stream, destination);
+    }
     thread_local Inflater inflater;
     return inflater.inflate(stream, destination);
 }

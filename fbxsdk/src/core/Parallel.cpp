@@ -7,12 +7,14 @@
 #include <algorithm>
 #include <atomic>
 #include <charconv>
+#include <chrono>
 #include <cstdlib>
 #include <exception>
 #include <mutex>
 #include <string_view>
 #include <system_error>
 #include <thread>
+#include <utility>
 #include <vector>
 
 #include <fbxsdk/extensions/Threads.h>
@@ -52,6 +54,7 @@ public:
             mCount = static_cast<int>(std::min(wanted, static_cast<std::size_t>(left)));
         } while (mCount > 0 && !helpersAtWork.compare_exchange_weak(atWork, atWork + mCount));
     }
+    HelperLeave(HelperLeave&& other) noexcept : mCount(std::exchange(other.mCount, 0)) {}
     HelperLeave(const HelperLeave&) = delete;
     HelperLeave& operator=(const HelperLeave&) = delete;
     ~HelperLeave() { helpersAtWork -= mCount; }
@@ -115,6 +118,97 @@ void forEachInParallel(std::size_t count, const std::function<void(std::size_t)>
         crew.run();
     }
     crew.rethrow();
+}
+
+WorkAhead::WorkAhead(std::vector<std::size_t> sizes, std::size_t mostReady, std::function<void(std::size_t)> work)
+    : mWork(std::move(work)), mSizes(std::move(sizes)), mStates(mSizes.size(), State::open), mMostReady(mostReady) {
+    startThreads();
+}
+
+WorkAhead::~WorkAhead() {
+    const std::lock_guard lock(mMutex);
+    mIsGivenUp = true;
+    mChanged.notify_all(); // the threads, which are joined before the rest goes, come to their end
+}
+
+void WorkAhead::startThreads() {
+    const std::lock_guard lock(mMutex); // they begin when it is known how many there are
+    mThreads.reserve(mStates.size());
+    try {
+        while (mThreads.size() < mStates.size()) {
+            HelperLeave leave(1);
+            if (leave.count() == 0) {
+                break;
+            }
+            mThreads.emplace_back([this, own = std::move(leave)] { workOn(); });
+        }
+    } catch (const std::exception&) { // no thread, or no memory for one: the others will do
+    }
+    mMostReady *= mThreads.empty() ? 0 : mThreads.size() + 1;
+}
+
+void WorkAhead::workOn() {
+    constexpr auto kPatience = std::chrono::milliseconds(20);
+    while (true) {
+        while (const std::optional<std::size_t> piece = begin()) {
+            work(*piece);
+        }
+        std::unique_lock lock(mMutex);
+        const auto canGoOn = [this] { return mIsGivenUp || mReady < mMostReady; };
+        if (!hasOpen() || !mChanged.wait_for(lock, kPatience, canGoOn) || mIsGivenUp) {
+            return;
+        }
+    }
+}
+
+bool WorkAhead::hasOpen() {
+    while (mFirstOpen < mStates.size() && mStates[mFirstOpen] != State::open) {
+        ++mFirstOpen;
+    }
+    return mFirstOpen < mStates.size();
+}
+
+std::optional<std::size_t> WorkAhead::begin() {
+    const std::lock_guard lock(mMutex);
+    if (mIsGivenUp || mReady >= mMostReady || !hasOpen()) {
+        return std::nullopt;
+    }
+    mStates[mFirstOpen] = State::begun;
+    mReady += mSizes[mFirstOpen];
+    return mFirstOpen;
+}
+
+void WorkAhead::work(std::size_t piece) {
+    State state = State::done;
+    try {
+        mWork(piece);
+    } catch (...) {
+        state = State::failed;
+    }
+    const std::lock_guard lock(mMutex);
+    mStates[piece] = state;
+    mChanged.notify_all();
+}
+
+bool WorkAhead::take(std::size_t piece) {
+    std::unique_lock lock(mMutex);
+    while (mStates[piece] == State::begun) {
+        lock.unlock();
+        const std::optional<std::size_t> other = begin();
+        if (other) {
+            work(*other);
+        }
+        lock.lock();
+        if (!other) {
+            mChanged.wait(lock, [&] { return mStates[piece] != State::begun; });
+        }
+    }
+    const State state = std::exchange(mStates[piece], State::taken);
+    if (state == State::done || state == State::failed) {
+        mReady -= mSizes[piece];
+        mChanged.notify_all();
+    }
+    return state == State::done;
 }
 
 } // namespace detail

@@ -4,8 +4,13 @@
 // Independent work on several threads.
 #pragma once
 
+#include <condition_variable>
 #include <cstddef>
 #include <functional>
+#include <mutex>
+#include <optional>
+#include <thread>
+#include <vector>
 
 #include <fbxsdk/FbxArch.h>
 
@@ -16,6 +21,44 @@ namespace detail {
 /// Returns when all calls have; rethrows what the first of them to fail threw, and starts no further ones then. Where
 /// no thread can be created, this one does all the work.
 void forEachInParallel(std::size_t count, const std::function<void(std::size_t)>& work);
+
+/// Pieces of work that other threads do before their results are requested, in order, on as many threads as
+/// `maximumThreads()` leaves. The threads end when no piece is left, or when no result is taken for some time. The
+/// owner is one thread, never one that does the work.
+class WorkAhead {
+public:
+    /// No piece is started while the total size of those that are ready and not taken is `mostReady` times the number
+    /// of threads. Throws std::bad_alloc; exceptions of the work mark the piece as failed.
+    WorkAhead(std::vector<std::size_t> sizes, std::size_t mostReady, std::function<void(std::size_t)> work);
+    WorkAhead(const WorkAhead&) = delete;
+    WorkAhead& operator=(const WorkAhead&) = delete;
+    /// Waits for pieces in progress.
+    ~WorkAhead();
+
+    /// Whether the piece was done; to be called once for each. Waits for a piece in progress, and does others
+    /// meanwhile. A piece that was not started, or that failed, is left to the caller.
+    [[nodiscard]] bool take(std::size_t piece);
+
+private:
+    enum class State { open, begun, done, failed, taken };
+
+    void startThreads();
+    void workOn();
+    [[nodiscard]] bool hasOpen();
+    [[nodiscard]] std::optional<std::size_t> begin();
+    void work(std::size_t piece);
+
+    std::function<void(std::size_t)> mWork;
+    std::mutex mMutex;
+    std::condition_variable mChanged;
+    std::vector<std::size_t> mSizes;
+    std::vector<State> mStates;
+    std::size_t mFirstOpen = 0; ///< or one before it
+    std::size_t mReady = 0;     ///< size of the pieces that were started and are not taken yet
+    std::size_t mMostReady;
+    bool mIsGivenUp = false;
+    std::vector<std::jthread> mThreads;
+};
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -101,6 +101,14 @@ struct DocumentLightSettings {
     double fogColor[4] = {1, 1, 1, 1};
 };
 
+/// Data that a later stage keeps with a document.
+struct DocumentCompanion {
+    DocumentCompanion() = default;
+    DocumentCompanion(const DocumentCompanion&) = delete;
+    DocumentCompanion& operator=(const DocumentCompanion&) = delete;
+    virtual ~DocumentCompanion() = default;
+};
+
 /// A document that was read, or is to be written. Views point into `tree`, or into the scene that is written.
 struct Document {
     std::unique_ptr<RecordTree> tree;                  ///< owns values and texts
@@ -126,6 +134,7 @@ struct Document {
     [[nodiscard]] std::span<const Value> keep(std::initializer_list<Value> values);
 
     std::vector<std::pair<std::int64_t, std::uint32_t>> idIndex; ///< sorted; filled by readDocument
+    mutable std::unique_ptr<DocumentCompanion> companion; ///< of geometry; the last member, since it refers to others
 };
 
 /// Reads a file of any generation. Null on failure; the status then names the file, the place and the fault.

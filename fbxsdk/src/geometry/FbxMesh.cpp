@@ -6,6 +6,7 @@
 
 #include <fbxsdk/FbxNode.h>
 
+#include "geometry/ArraysAhead.h"
 #include "geometry/GeometryReading.h"
 #include "geometry/ItemReading.h"
 #include "geometry/tessellation/TessellationMesh.h"
@@ -51,8 +52,10 @@ FbxNodeAttribute::EType FbxMesh::GetAttributeType() const { return eMesh; }
 bool FbxMesh::readSource(const detail::GeometrySource& pSource) {
     if (pSource.surface)
         return detail::fillMesh(*this, *pSource.surface);
-    mRepairedCorners = detail::readMesh(*this, pSource);
-    detail::readLayers(*this, pSource);
+    detail::GeometrySource source = pSource;
+    source.ahead = detail::ArraysAhead::ofMesh(*source.body, *source.document);
+    mRepairedCorners = detail::readMesh(*this, source);
+    detail::readLayers(*this, source);
     if (const detail::Record* edges = pSource.body->child("Edges"))
         detail::readLate(pSource.document, *edges, mEdges, detail::LateReading::whole);
     return true;

@@ -70,7 +70,7 @@ void attachSource(FbxGeometryBase& geometry, const std::shared_ptr<const Documen
 
 int readMesh(FbxMesh& mesh, const GeometrySource& source) {
     if (const Record* vertices = source.body->child("Vertices"))
-        readLate(source.document, *vertices, mesh.points());
+        readLate(source.document, *vertices, mesh.points(), LateReading::shown, nullptr, source.ahead);
     const Record* polygons = source.body->child("PolygonVertexIndex");
     if (!polygons)
         return 0;

@@ -11,6 +11,7 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+class ArraysAhead;
 struct Document;
 struct MeshOfSurface;
 
@@ -19,6 +20,7 @@ struct GeometrySource {
     std::shared_ptr<const Document> document;
     const Record* body = nullptr;
     std::shared_ptr<const MeshOfSurface> surface{}; ///< of a mesh that replaces a surface; there is no document then
+    std::shared_ptr<ArraysAhead> ahead{};           ///< null where nothing is inflated in advance
 };
 
 } // namespace detail

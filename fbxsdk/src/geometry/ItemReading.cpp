@@ -11,8 +11,7 @@
 #include <type_traits>
 #include <vector>
 
-#include "container/ByteOrder.h"
-#include "container/NumberDecoding.h"
+#include "geometry/ArraysAhead.h"
 #include "geometry/StoredItems.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -85,23 +84,14 @@ bool decodeAll(const Record& record, PlainArray<Item>& items) {
     return keptIf(decode(record, resized(record, items, kNumbersPerItem<Item>)), items);
 }
 
-/// Smaller arrays do not justify a window to the file.
-constexpr std::size_t kLeastStoredBytes = std::size_t{1} << 14;
-
-/// Whether the packed numbers of an array have the layout of items.
-template <class Item>
-bool holdsItems(const StoredArray& array) {
-    using Element = StoredArray::Element;
-    constexpr Element kElement = std::is_same_v<Item, int> ? Element::int32 : Element::float64;
-    return !std::is_same_v<Item, bool> && array.element == kElement && array.stride == 0 &&
-           !needsSwap(array.bigEndian) && array.count * elementSize(kElement) >= kLeastStoredBytes;
-}
-
 /// Null when the array is corrupt.
-std::unique_ptr<StoredBytes> storedBytes(const std::shared_ptr<const FileBytes>& file, const StoredArray& array) {
+std::unique_ptr<StoredBytes> storedBytes(const std::shared_ptr<const FileBytes>& file, const StoredArray& array,
+                                         ArraysAhead* ahead) {
     if (!array.compressed)
         return std::make_unique<FileWindow>(file, array);
-    auto inflated = std::make_unique<InflatedBytes>(file, array);
+    std::unique_ptr<InflatedBytes> inflated = ahead ? ahead->take(array) : nullptr;
+    if (!inflated)
+        inflated = std::make_unique<InflatedBytes>(file, array);
     return inflated->isSound() ? std::move(inflated) : nullptr;
 }
 
@@ -128,24 +118,26 @@ template <class Item>
 class RecordItems final : public StoredItems<Item> {
 public:
     RecordItems(std::shared_ptr<const Document> document, const Record& record, LateReading reading,
-                const Record* fourth)
+                const Record* fourth, std::shared_ptr<ArraysAhead> ahead)
         : StoredItems<Item>(itemCount(record, kNumbersPerItem<Item>)), mDocument(std::move(document)), mRecord(record),
-          mReading(reading), mFourth(fourth) {}
+          mReading(reading), mFourth(fourth), mAhead(std::move(ahead)) {}
 
     [[nodiscard]] bool show() override {
         const StoredArray* const array = mRecord.array();
         const std::shared_ptr<const FileBytes>& file = mDocument->tree->file;
         if (mReading == LateReading::whole || !array || !file || !file->contains(array->bytes) ||
-            !holdsItems<Item>(*array) || unusualFourths(mFourth).count > 0)
+            !holdsLargeItems<Item>(*array) || unusualFourths(mFourth).count > 0)
             return false;
-        this->setBytes(storedBytes(file, *array));
-        if (this->hasBytes())
+        this->setBytes(storedBytes(file, *array, mAhead.get()));
+        if (this->hasBytes()) {
+            mAhead.reset();
             mDocument.reset(); // the bytes depend only on the file
+        }
         return this->hasBytes();
     }
 
     [[nodiscard]] bool read(void* items) override {
-        if (this->hasBytes())
+        if (this->hasBytes() || (mAhead && show()))
             return StoredItems<Item>::read(items);
         const std::span<Item> all(static_cast<Item*>(items), static_cast<std::size_t>(this->count()));
         if (!decode(mRecord, all))
@@ -163,6 +155,7 @@ private:
     const Record& mRecord; ///< owned by the document
     LateReading mReading;
     const Record* mFourth;
+    std::shared_ptr<ArraysAhead> mAhead; ///< destroyed before the document, which owns its arrays
 };
 
 } // namespace
@@ -180,19 +173,23 @@ bool readWeightedPoints(const Record& record, PlainArray<FbxVector4>& items) {
 
 template <class Item>
 void readLate(std::shared_ptr<const Document> document, const Record& record, PlainArray<Item>& items,
-              LateReading reading, const Record* fourth) {
-    items.setSource(std::make_unique<RecordItems<Item>>(std::move(document), record, reading, fourth));
+              LateReading reading, const Record* fourth, std::shared_ptr<ArraysAhead> ahead) {
+    items.setSource(
+        std::make_unique<RecordItems<Item>>(std::move(document), record, reading, fourth, std::move(ahead)));
 }
 
 template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<FbxVector4>&, LateReading,
-                       const Record*);
+                       const Record*, std::shared_ptr<ArraysAhead>);
 template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<FbxVector2>&, LateReading,
-                       const Record*);
+                       const Record*, std::shared_ptr<ArraysAhead>);
 template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<FbxColor>&, LateReading,
-                       const Record*);
-template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<int>&, LateReading, const Record*);
-template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<double>&, LateReading, const Record*);
-template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<bool>&, LateReading, const Record*);
+                       const Record*, std::shared_ptr<ArraysAhead>);
+template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<int>&, LateReading, const Record*,
+                       std::shared_ptr<ArraysAhead>);
+template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<double>&, LateReading, const Record*,
+                       std::shared_ptr<ArraysAhead>);
+template void readLate(std::shared_ptr<const Document>, const Record&, PlainArray<bool>&, LateReading, const Record*,
+                       std::shared_ptr<ArraysAhead>);
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -40,6 +40,7 @@ struct ArrayRecords {
     const Record* direct;
     const Record* fourth;
     const Record* index;
+    const std::shared_ptr<ArraysAhead>& ahead;
 };
 
 using CreateElement = Element* (*)(FbxLayerContainer& container, const char* name, const ArrayRecords& records);
@@ -52,10 +53,11 @@ Element* create(FbxLayerContainer& container, const char* name, const ArrayRecor
     if constexpr (!std::is_pointer_v<Item>) {
         if (records.direct)
             readLate(records.document, *records.direct, element->GetDirectArray().items(), LateReading::shown,
-                     records.fourth);
+                     records.fourth, records.ahead);
     }
     if (records.index)
-        readLate(records.document, *records.index, element->GetIndexArray().items());
+        readLate(records.document, *records.index, element->GetIndexArray().items(), LateReading::shown, nullptr,
+                 records.ahead);
     return element;
 }
 
@@ -180,7 +182,7 @@ private:
             return nullptr;
         const Element::EReferenceMode reference = referenceOf(record, kind.row.storage, index != nullptr);
         const ArrayRecords arrays{mSource.document, direct, childWithNumbers(record, kind.row.fourth),
-                                  reference == Element::eDirect ? nullptr : index};
+                                  reference == Element::eDirect ? nullptr : index, mSource.ahead};
         const std::string name(record.childValue("Name").toText());
         Element* element = creatorOf(kind.row.type)(mContainer, name.c_str(), arrays);
         element->SetMappingMode(*mapping);

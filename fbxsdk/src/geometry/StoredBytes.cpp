@@ -45,6 +45,7 @@ const char* FileWindow::look(std::span<const char> part) {
 InflatedBytes::InflatedBytes(std::shared_ptr<const FileBytes> file, const StoredArray& array)
     : mFile(std::move(file)), mArray(array),
       mMemory(static_cast<std::size_t>(array.count) * elementSize(array.element)) {
+    preferLargePages(mMemory.bytes());
     inflate();
 }
 
@@ -58,7 +59,8 @@ void InflatedBytes::inflate() {
 void InflatedBytes::release(std::span<const char> part) {
     if (mStays || part.empty())
         return;
-    releasePages(part);
+    const bool hasLargePages = mMemory.bytes().size() >= 2 * kLargePage; // one at least, wherever it begins
+    (hasLargePages ? releaseLargePages : releasePages)(part);
     mIncomplete = true;
 }
 

@@ -4,6 +4,8 @@
 
 #include <algorithm>
 
+#include "container/PageMemory.h"
+
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 namespace {
@@ -24,9 +26,8 @@ StoredWindow::~StoredWindow() {
 
 /// Releases the items up to an index, those before the window for the second time: they may share a page with others.
 void StoredWindow::releaseUpTo(int end) {
-    constexpr std::size_t kLargestPage = std::size_t{1} << 16;
     const std::size_t start = static_cast<std::size_t>(mWindowStart) * mItemBytes;
-    const std::size_t from = start - std::min(start, kLargestPage);
+    const std::size_t from = start - std::min(start, kLargePage);
     mBytes->release(mBytes->bytes().subspan(from, static_cast<std::size_t>(end) * mItemBytes - from));
 }
 

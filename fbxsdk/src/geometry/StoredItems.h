@@ -47,9 +47,7 @@ public:
         for (int i = 0; i < count(); ++i) {
             if (!hasInWindow(i))
                 moveWindow(i);
-            Item item{};
-            std::memcpy(static_cast<void*>(&item), at(i, kStoredBytes<Item>), kStoredBytes<Item>);
-            to[i] = item;
+            to[i] = storedItem<Item>(at(i, kStoredBytes<Item>));
         }
         return true;
     }

@@ -6,7 +6,9 @@
 
 #include <algorithm>
 #include <atomic>
+#include <chrono>
 #include <mutex>
+#include <new>
 #include <numeric>
 #include <set>
 #include <stdexcept>
@@ -101,6 +103,88 @@ TEST_F(Parallel, CanBeUsedWithinItself) {
     std::atomic<int> done{0};
     forEachInParallel(5, [&](std::size_t) { forEachInParallel(7, [&](std::size_t) { ++done; }); });
     EXPECT_EQ(done, 35);
+}
+
+TEST_F(Parallel, DoesWorkAheadOnOtherThreads) {
+    std::vector<std::thread::id> threads(2);
+    WorkAhead work({1, 1}, 1, [&](std::size_t i) { threads[i] = std::this_thread::get_id(); });
+    std::this_thread::sleep_for(std::chrono::milliseconds(20));
+    EXPECT_NE(work.take(0) ? threads[0] : std::thread::id(), std::this_thread::get_id());
+}
+
+TEST_F(Parallel, DoesEveryPieceAheadOrLeavesItToTheCaller) {
+    for (int round = 0; round < 200; ++round) {
+        std::vector<int> done(20, 0);
+        WorkAhead work(std::vector<std::size_t>(done.size(), 1), 1, [&](std::size_t i) { ++done[i]; });
+        for (std::size_t i = done.size(); i-- > 0;)
+            done[i] += work.take(i) ? 0 : 1;
+        ASSERT_EQ(done, std::vector<int>(20, 1));
+    }
+}
+
+TEST_F(Parallel, HasNoMoreReadyThanThereAreThreads) {
+    std::atomic<int> done{0};
+    {
+        WorkAhead work(std::vector<std::size_t>(100, 1), 1, [&](std::size_t) { ++done; });
+        std::this_thread::sleep_for(std::chrono::milliseconds(20));
+        EXPECT_LE(done, 3);
+    }
+    EXPECT_LE(done, 3) << "nor does anybody begin with more when the work is given up";
+}
+
+TEST_F(Parallel, GoesOnAheadWhenWhatIsReadyIsTaken) {
+    for (int round = 0; round < 20; ++round) {
+        int done = 0;
+        {
+            WorkAhead work({5, 1, 1, 7, 1, 1, 9, 2}, 2, [&](std::size_t) {});
+            for (std::size_t i = 0; i < 8; ++i) {
+                std::this_thread::sleep_for(std::chrono::milliseconds(1));
+                done += work.take(i) ? 1 : 0;
+            }
+        }
+        if (done == 8)
+            return;
+    }
+    FAIL() << "threads end before all is done";
+}
+
+TEST_F(Parallel, EndsWhenNobodyTakesWhatIsReady) {
+    WorkAhead work(std::vector<std::size_t>(100, 1), 1, [](std::size_t) {});
+    std::size_t most = 1;
+    for (int i = 0; i < 1000 && most == 1; ++i)
+        most = threadsAtWork().size();
+    EXPECT_GT(most, 1U);
+    for (std::size_t i = 0; i < 100; ++i)
+        static_cast<void>(work.take(i));
+}
+
+TEST_F(Parallel, LeavesPiecesThatFailToTheCaller) {
+    std::atomic<bool> failed{false};
+    WorkAhead work({1}, 1, [&](std::size_t) {
+        failed = true;
+        throw std::bad_alloc();
+    });
+    while (!failed)
+        std::this_thread::yield();
+    EXPECT_FALSE(work.take(0));
+}
+
+TEST_F(Parallel, DoesNothingAheadOnOneThread) {
+    extensions::setMaximumThreads(1);
+    WorkAhead work({1, 1, 1}, 1, [](std::size_t) { FAIL(); });
+    for (std::size_t i = 0; i < 3; ++i)
+        EXPECT_FALSE(work.take(i));
+}
+
+TEST_F(Parallel, GivesThreadsBackThatHaveNothingMoreToDoAhead) {
+    std::atomic<int> done{0};
+    WorkAhead idle({1, 1}, 1, [&](std::size_t) { ++done; });
+    while (done < 2)
+        std::this_thread::yield();
+    std::size_t most = 1;
+    for (int i = 0; i < 1000 && most == 1; ++i)
+        most = threadsAtWork().size();
+    EXPECT_GT(most, 1U);
 }
 
 } // namespace

@@ -1,11 +1,13 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes large enough that their arrays stay in the file, plain and compressed, read in every way.
+// Meshes large enough that their arrays stay in the file, plain and compressed, read in every way, by one thread and by
+// several.
 #include <cmath>
 #include <numeric>
 
 #include <fbxsdk/FbxLayer.h>
+#include <fbxsdk/extensions/Threads.h>
 
 #include "GeometryFixture.h"
 #include "support/BinaryRecordBuilder.h"
@@ -20,7 +22,12 @@ constexpr int kCorners = 3 * kPoints;
 
 enum class Storage { plain, compressed, corrupt };
 
-class StoredMesh : public GeometryFixture, public testing::WithParamInterface<Storage> {
+struct Reading {
+    Storage storage;
+    int threads;
+};
+
+class StoredMesh : public GeometryFixture, public testing::WithParamInterface<Reading> {
 protected:
     StoredMesh() : mPoints(3 * kPoints), mNormals(3 * kCorners), mUvs(2 * kPoints), mUvIndex(kCorners) {
         std::iota(mPoints.begin(), mPoints.end(), 0.5);
@@ -30,6 +37,8 @@ protected:
             mUvIndex[static_cast<std::size_t>(i)] = kPoints - 1 - i / 3;
         }
     }
+
+    ~StoredMesh() override { extensions::setMaximumThreads(1); }
 
     FbxMesh* mesh() {
         FbxStatus status;
@@ -98,7 +107,10 @@ private:
 
 class SoundStoredMesh : public StoredMesh {
 protected:
-    SoundStoredMesh() { mStorage = GetParam(); }
+    SoundStoredMesh() {
+        mStorage = GetParam().storage;
+        extensions::setMaximumThreads(GetParam().threads);
+    }
 };
 
 TEST_P(SoundStoredMesh, HasItsValuesInOrderAgainAndAgain) {
@@ -170,18 +182,34 @@ TEST_P(SoundStoredMesh, LosesTheCornersOfARemovedPolygon) {
     EXPECT_EQ(uvsOf(read).GetIndexArray().GetAt(0), mUvIndex[3]);
 }
 
-INSTANTIATE_TEST_SUITE_P(Storages, SoundStoredMesh, testing::Values(Storage::plain, Storage::compressed),
+INSTANTIATE_TEST_SUITE_P(Readings, SoundStoredMesh,
+                         testing::Values(Reading{Storage::plain, 1}, Reading{Storage::compressed, 1},
+                                         Reading{Storage::compressed, 3}),
                          [](const auto& suite) {
-                             return std::string(suite.param == Storage::plain ? "Plain" : "Compressed");
+                             return std::string(suite.param.storage == Storage::plain ? "Plain" : "Compressed") + "By" +
+                                    std::to_string(suite.param.threads);
                          });
+
+TEST_F(StoredMesh, GoesWhileOtherThreadsReadIt) {
+    mStorage = Storage::compressed;
+    extensions::setMaximumThreads(3);
+    for (int round = 0; round < 5; ++round) {
+        FbxMesh* read = mesh();
+        EXPECT_EQ(read->GetControlPointAt(1), item(mPoints, 1));
+        read->Destroy();
+    }
+}
 
 TEST_F(StoredMesh, HasNoItemsOfACorruptArray) {
     mStorage = Storage::corrupt;
-    FbxMesh* read = mesh();
+    for (const int threads : {1, 2, 8}) {
+        extensions::setMaximumThreads(threads);
+        FbxMesh* read = mesh();
 
-    EXPECT_EQ(read->GetPolygonCount(), kPoints);
-    EXPECT_EQ(normalsOf(read).GetDirectArray().GetCount(), 0);
-    EXPECT_EQ(uvsOf(read).GetIndexArray().GetCount(), 0);
+        EXPECT_EQ(read->GetPolygonCount(), kPoints);
+        EXPECT_EQ(normalsOf(read).GetDirectArray().GetCount(), 0);
+        EXPECT_EQ(uvsOf(read).GetIndexArray().GetCount(), 0);
+    }
 }
 
 } // namespace

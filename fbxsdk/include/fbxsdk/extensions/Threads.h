@@ -10,9 +10,10 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace extensions {
 
-/// The maximum number of threads, the callers' own not counted twice: all calls of the process share those beyond
-/// one. Threads start and end within the call that uses them. What is read and written is the same for every
-/// number.
+/// How many threads work at most, the callers' own not counted twice: all calls of the process share what is beyond
+/// one. Threads start and end within the call that uses them, except those that inflate arrays of meshes in advance:
+/// they end when no more are requested, at the latest with the scene, which waits for them. What is read and written is
+/// the same for every number.
 [[nodiscard]] FBXSDK_DLL int maximumThreads();
 
 /// 1 means the caller's thread alone, the default unless TARNELL_FBX_THREADS in the environment says otherwise; 0 means
