@@ -35,7 +35,7 @@ struct LongRun : testing::Test {
         if (!tree)
             return status.GetErrorString();
         EXPECT_EQ(tree->root.child("Next")->numberCount(), 3U);
-        EXPECT_EQ(tree->root.child("Last")->location, 2U + countLines(list) + 6U);
+        EXPECT_EQ(tree->placeOf(*tree->root.child("Last")), "line " + std::to_string(2 + countLines(list) + 6));
         const Record& record = *tree->root.child("List");
         std::vector<Number> numbers(record.numberCount());
         EXPECT_TRUE(record.readNumbers(std::span<Number>(numbers)));
