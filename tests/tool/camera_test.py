@@ -302,6 +302,27 @@ class Frames(Close):
         self.assertIn('"walk", "run"', result.stderr)
 
 
+class Origins(Close):
+    def lines(self, text):
+        page = run("camera", "--explain", "-", input=text).stdout.split("Where this comes from\n")[1]
+        return dict(line.strip().split(": ", 1) for line in page.splitlines())
+
+    def test_of_orthographic_cameras_speak_of_no_lens(self):
+        lines = self.lines(scene({"CameraProjectionType": 1, "FilmWidth": 1.5, "FilmHeight": 1.0, "GateFit": 3,
+                                  "AspectRatioMode": 2, "AspectWidth": 300.0, "AspectHeight": 300.0}))
+        self.assertNotIn("Focal length", lines)
+        self.assertTrue(lines["Picture"].endswith("= 1:1"), lines["Picture"])
+
+    def test_have_seven_digits_where_props_has_all(self):
+        lines = self.lines(scene({"ApertureMode": 3, "FilmWidth": 1.4173200000000001, "FilmHeight": 0.999999985}))
+        self.assertIn("FilmWidth 1.41732 in × FilmSqueezeRatio 1, FilmHeight 1 in", lines["Film back"])
+
+    def test_name_the_keys_before_what_stands_without_them(self):
+        page = run("camera", "--explain", SHOT).stdout
+        self.assertIn("Focal length: FocalLength by its keys, 35 mm without them, as it is", page)
+        self.assertIn("Lcl Translation by its keys, (0, 100, 600) without them; × 1 cm", page)
+
+
 class Choice(unittest.TestCase):
     def test_a_name_picks_cameras(self):
         file = os.path.join(SDK_DATA, "kinds_of_nodes_7400_ascii.fbx")

@@ -11,7 +11,7 @@ import sys
 import tempfile
 import unittest
 
-from support import SDK_DATA, SHOT, edited, run
+from support import SDK_DATA, SHOT, edited, float32, run
 
 
 def fixture(name):
@@ -128,6 +128,36 @@ class Targets(unittest.TestCase):
             result = run("curve", SHOT, target)
             self.assertEqual((result.returncode, result.stdout), (1, ""), target)
             self.assertEqual(len(result.stderr.splitlines()), 1)
+
+
+class Words(unittest.TestCase):
+    def test_of_extrapolation_tell_without_end_from_a_number_of_times(self):
+        file = fixture("extrapolation_7400_ascii.fbx")
+        sides = {each["component"]: each["curves"][0] for each in curves(file, "endless")["channels"]}
+        for component, kind in (("X", "repetition"), ("Y", "mirror")):
+            for side in ("before", "after"):
+                self.assertEqual(sides[component][side], {"type": kind, "count": None})
+        page = run("curve", file, "endless").stdout
+        self.assertIn("before repetition without end, after repetition without end", page)
+        self.assertIn("before slope, after slope", page)
+        self.assertIn("before constant, after repetition once", run("curve", file, "other").stdout)
+
+    def test_of_extrapolation_tell_zero_times_from_without_end(self):
+        with tempfile.TemporaryDirectory() as folder:
+            file = edited("extrapolation_7400_ascii.fbx", os.path.join(folder, "zero.fbx"),
+                          ("Type: R\n\t\t\tRepetition: 1\n", "Type: R\n\t\t\tRepetition: 0\n"))
+            self.assertIn("after repetition 0 times", run("curve", file, "other").stdout)
+
+    def test_of_numbers_have_the_digits_that_floats_hold(self):
+        page = curves(SHOT, "shotCam.FocalLength", "--frames", "1001:1010")["channels"][0]
+        text = run("curve", SHOT, "shotCam.FocalLength", "--frames", "1001:1010").stdout
+        for row, value in zip(text.splitlines()[-10:], page["samples"]["values"]):
+            self.assertLessEqual(len(row.split()[-1]), 9)
+            self.assertEqual(float32(float(row.split()[-1])), value)
+
+    def test_of_a_plot_say_what_stands_still_in_a_line(self):
+        text = run("curve", SHOT, "shotCam.FocusDistance", "--plot").stdout.splitlines()
+        self.assertEqual(text[3:], ["shotCam.FocusDistance  1000000 throughout, from frame 1001 to 1048"])
 
 
 class Takes(unittest.TestCase):

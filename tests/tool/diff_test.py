@@ -256,6 +256,10 @@ class Forms(Folder):
         self.assertEqual(json.loads(line), json.loads(run("diff", "--json", a, b).stdout))
         self.assertIn('"cam"  focalLength: 35 → 50, 15 mm apart at frame 0', run("diff", a, b).stdout)
 
+    def test_of_text_do_not_say_a_kind_twice(self):
+        a, b = self.file("a.fbx", scenes.scene()), self.file("b.fbx", scenes.scene(unit=100.0))
+        self.assertIn("  unit       centimetre → metre\n", run("diff", a, b).stdout)
+
     def test_of_the_readme_is_what_is_printed(self):
         self.file("old.fbx", scenes.scene())
         self.file("new.fbx", scenes.scene(names=("shotCam", "tri"), frames=(0, 4), values=[0.5, 4.5],

@@ -99,7 +99,7 @@ class Findings(unittest.TestCase):
                                  ("span-differs-from-keys", "shot", "frames 0 to 10, its keys are at 0 to 4"),
                                  ("rotation-flips", "cam", "from 180° to −175° between frames 2 and 3"),
                                  ("film-shape-differs", "cam", "the film is 1.7778:1, the picture 0.9259:1"),
-                                 ("far-from-origin", "tri", "2e+05 cm from the origin, where floats are 0.0156 cm apart"),
+                                 ("far-from-origin", "tri", "200000 cm from the origin, where floats are 0.0156 cm apart"),
                                  ("lens-values-disagree", "cam", "FieldOfViewX is 90°"),
                                  ("polygons-out-of-range", "tri", "1 corner names a point beyond the 3 that there are"),
                                  ("cache-unusable", "tri", "4"), ("cache-range", "tri", "from frame 0 to 2"),

@@ -139,6 +139,21 @@ class Output(Folder):
             process.stderr.close()
 
 
+class Info(Folder):
+    def test_is_one_screen(self):
+        many = "".join('\tModel: %d, "Model::n%d", "Null" {\n\t}\n' % (100 + i, i) for i in range(60))
+        links = "".join('\tC: "OO",%d,0\n' % (100 + i) for i in range(60))
+        file = edited("nulls_7400_ascii.fbx", self.path("many.fbx"), ("Objects:  {\n", "Objects:  {\n" + many),
+                      ("Connections:  {\n", "Connections:  {\n" + links))
+        lines = run("info", file).stdout.splitlines()
+        self.assertLess(len(lines), 60)
+        nodes = len(json.loads(run("tree", "--json", file).stdout)["nodes"])
+        self.assertEqual(lines[-1], f"    … and {nodes - 40} more; tarnell-fbx tree has all")
+
+    def test_says_when_takes_begin_and_end_to_four_decimals(self):
+        self.assertIn("frames 1001 to 1048  (41.7083 to 43.6667 s)", run("info", SHOT).stdout)
+
+
 class Terminals(Folder):
     def test_show_colours_unless_somebody_minds(self):
         self.assertIn(ESCAPE, on_terminal("tree", SHOT))

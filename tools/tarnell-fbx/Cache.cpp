@@ -7,6 +7,7 @@
 #include <filesystem>
 #include <map>
 #include <optional>
+#include <set>
 #include <system_error>
 
 #include <fbxsdk.h>
@@ -205,12 +206,7 @@ void printUse(const MeshUse& use, const std::string& path, std::ostream& out, co
         out << "  " << terminal.paint(Ink::warning, "The mesh shows without it: " + terminalText(use.fault)) << '\n';
 }
 
-void printEntry(const CacheEntry& entry, const CacheOptions& options, std::ostream& out, const Terminal& terminal) {
-    if (entry.use)
-        printUse(*entry.use, entry.path, out, terminal);
-    if (entry.path.empty())
-        return;
-    const CacheFacts& facts = entry.facts;
+void printContent(const CacheFacts& facts, const CacheOptions& options, std::ostream& out, const Terminal& terminal) {
     out << "  " << kindText(facts) << "\n  " << facts.fileNames.size()
         << (facts.fileNames.size() == 1 ? " data file, " : " data files, ") << sizeText(facts.bytes) << '\n';
     printChannels(facts, out, terminal);
@@ -223,7 +219,23 @@ void printEntry(const CacheEntry& entry, const CacheOptions& options, std::ostre
         out << "  Verified: all samples are there, and every number is finite\n";
 }
 
-// ---- JSON ----
+/// A cache that several deformers use, each a channel of it, is shown once.
+void printEntries(const std::vector<CacheEntry>& entries, const CacheOptions& options, Page& page, std::ostream& out) {
+    std::set<std::string> shown;
+    for (const CacheEntry& entry : entries) {
+        if (entry.use)
+            printUse(*entry.use, entry.path, out, page.terminal());
+        if (entry.path.empty())
+            continue;
+        if (shown.insert(entry.path).second) {
+            printContent(entry.facts, options, out, page.terminal());
+        } else {
+            out << "  As above\n";
+        }
+    }
+}
+
+// ---- For programs ----
 
 void printUse(const std::optional<MeshUse>& use, JsonWriter& json) {
     json.key("use");
@@ -361,8 +373,7 @@ int cache(const CacheOptions& options) {
         } else {
             std::ostream& out = page.begin();
             out << page.terminal().paint(Ink::heading, spoken(page.file())) << '\n';
-            for (const CacheEntry& entry : entries)
-                printEntry(entry, options, out, page.terminal());
+            printEntries(entries, options, page, out);
             if (entries.empty())
                 out << "  no mesh has a point cache\n";
         }

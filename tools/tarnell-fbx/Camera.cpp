@@ -144,7 +144,7 @@ void printIdle(const CameraFacts& camera, std::ostream& out, const Terminal& ter
 void printChannels(const CameraFacts& camera, std::ostream& out, const Terminal& terminal) {
     if (camera.movedBy)
         out << "  " << terminal.paint(Ink::faint, "Moved along by") << ' ' << inQuotes(*camera.movedBy) << '\n';
-    Table table({{"Keys of"},
+    Table table({{"Keys, as in the file"},
                  {"Count", Table::Align::right},
                  {"First frame", Table::Align::right},
                  {"Last frame", Table::Align::right},
@@ -161,7 +161,7 @@ void printChannels(const CameraFacts& camera, std::ostream& out, const Terminal&
 
 void printFrames(const CameraFacts& camera, const Range& range, std::ostream& out, const Terminal& terminal) {
     std::vector<Table::Column> columns;
-    for (const char* title : {"Frame", "Focal length", "FOV of picture", "X", "Y", "Z", "Looks X", "Y", "Z"})
+    for (const char* title : {"Frame", "Lens mm", "FOV of picture", "X cm", "Y cm", "Z cm", "Looks X", "Y", "Z"})
         columns.push_back({title, Table::Align::right, columns.empty() ? Ink::plain : Ink::number});
     Table table(columns);
     for (long long frame = range.first; frame <= range.last; ++frame) {
@@ -182,7 +182,7 @@ void printOrigins(const CameraFacts& camera, std::ostream& out, const Terminal& 
     for (const Origin& origin : camera.origins)
         line(origin.what, origin.text);
     for (const IdleValue& idle : camera.idle)
-        line(idle.property + ' ' + idle.value, "not in force, " + idle.reason);
+        line(idle.property + ' ' + idle.shortValue, "not in force, " + idle.reason);
 }
 
 void printCamera(const CameraFacts& camera, const CameraOptions& options, const Range& range, std::ostream& out,

@@ -13,6 +13,8 @@
 namespace tool {
 namespace {
 
+std::string withMinus(std::string text) { return !text.empty() && text.front() == '-' ? "−" + text.substr(1) : text; }
+
 const FbxCamera& cameraOf(const CameraFacts& facts) { return *facts.node->GetCamera(); }
 
 bool isNamed(const FbxProperty& property, std::initializer_list<const char*> names) {
@@ -42,8 +44,24 @@ FbxAMatrix turnOf(const Vector3& angles) {
     return turn;
 }
 
+/// For people, as many digits as floats have; `props` has all of them.
+std::string shortText(double number) { return significant(number + 0.0, 7); }
+
+std::string shortText(const FbxProperty& property) {
+    switch (property.GetPropertyDataType().GetType()) {
+    case eFbxDouble:
+        return shortText(property.Get<FbxDouble>());
+    case eFbxDouble3: {
+        const auto vector = property.Get<FbxDouble3>();
+        return '(' + shortText(vector[0]) + ", " + shortText(vector[1]) + ", " + shortText(vector[2]) + ')';
+    }
+    default:
+        return valueText(property);
+    }
+}
+
 std::string withUnit(const FbxProperty& property, const char* unit) {
-    return std::string(property.GetName().Buffer()) + ' ' + valueText(property) + unit;
+    return std::string(property.GetName().Buffer()) + ' ' + shortText(property) + unit;
 }
 
 // ---- Values without effect ----
@@ -65,7 +83,7 @@ private:
         const std::string value = valueText(property);
         const bool isReal = property.GetPropertyDataType().GetType() == eFbxDouble;
         mValues.push_back({property.GetHierarchicalName().Buffer(), value, std::move(reason),
-                           isReal ? rounded(property.Get<FbxDouble>(), 4) : value});
+                           isReal ? rounded(property.Get<FbxDouble>(), 4) : shortText(property)});
     }
     void addUnless(double expected, const char* name, const std::string& reason) {
         const FbxProperty property = mCamera.FindProperty(name);
@@ -136,7 +154,8 @@ public:
         : mFacts(facts), mMoment(moment), mFile(file), mCamera(cameraOf(facts)) {}
 
     std::vector<Origin> take() {
-        addLens();
+        if (!mFacts.orthographic)
+            addLens();
         addFilm();
         addAngles();
         addPicture();
@@ -181,11 +200,13 @@ private:
             return each.property.compare(0, name.size(), name) == 0 &&
                    (each.property.size() == name.size() || each.property[name.size()] == '.');
         });
-        return withUnit(property, unit) + (keyed ? " without its keys" : "");
+        return keyed ? std::string(property.GetName().Buffer()) + " by its keys, " + shortText(property) + unit +
+                           " without them"
+                     : withUnit(property, unit);
     }
 
     void addFilm() {
-        add("Film back", stated(mCamera.FilmWidth, " in") + " × FilmSqueezeRatio " + exactText(mFacts.squeeze) + ", " +
+        add("Film back", stated(mCamera.FilmWidth, " in") + " × FilmSqueezeRatio " + shortText(mFacts.squeeze) + ", " +
                              stated(mCamera.FilmHeight, " in") + "; × 25.4 mm per inch");
         if (mMoment.offsetX != 0.0 || mMoment.offsetY != 0.0)
             add("Film offset", stated(mCamera.FilmOffsetX, " in") + ", " + stated(mCamera.FilmOffsetY, " in"));
@@ -210,10 +231,11 @@ private:
         if (mFacts.pictureAspect <= 0.0)
             return add("Picture", "the file states no resolution: the picture is the film");
         std::string text = withUnit(mCamera.AspectWidth, "") + " : " + withUnit(mCamera.AspectHeight, "") +
-                           " × PixelAspectRatio " + exactText(mFacts.pixelAspect) + " (" + aspectModeText() +
-                           ") = " + rounded(mFacts.pictureAspect, 4) + ":1; the film is " +
-                           rounded(mMoment.film.aspect(), 4) + ":1; " + withUnit(mCamera.GateFit, "") + ": " +
-                           fitText();
+                           " × PixelAspectRatio " + shortText(mFacts.pixelAspect) + " (" + aspectModeText() +
+                           ") = " + rounded(mFacts.pictureAspect, 4) + ":1";
+        if (!mFacts.orthographic) // which have a width of their own
+            text += "; the film is " + rounded(mMoment.film.aspect(), 4) + ":1; " + withUnit(mCamera.GateFit, "") +
+                    ": " + fitText();
         add("Picture", std::move(text));
     }
 
@@ -289,8 +311,6 @@ private:
     std::vector<Origin> mList;
 };
 
-std::string withMinus(std::string text) { return !text.empty() && text.front() == '-' ? "−" + text.substr(1) : text; }
-
 } // namespace
 
 bool isInForce(const CameraFacts& facts, const FbxProperty& property) {
@@ -339,7 +359,12 @@ std::string rounded(double number, int decimals) {
 
 std::string significant(double number, int digits) {
     char text[64];
-    std::snprintf(text, sizeof text, "%.*g", digits, number);
+    constexpr double kUsual = 1e15;
+    if (std::abs(number) >= std::pow(10.0, digits) && std::abs(number) < kUsual) {
+        std::snprintf(text, sizeof text, "%.0f", number); // not 2e+05
+    } else {
+        std::snprintf(text, sizeof text, "%.*g", digits, number);
+    }
     return withMinus(text);
 }
 

@@ -182,10 +182,12 @@ FrameRange defaultRange(const SceneFile& file, FbxAnimStack* take, const std::ve
 std::string shortNumber(double number) { return numberText(std::round(number * 1e6) / 1e6); }
 
 std::string extrapolationText(const Extrapolation& extrapolation) {
-    std::string text = extrapolation.type;
-    if (extrapolation.count)
-        text += " (" + std::to_string(*extrapolation.count) + " times)";
-    return text;
+    if (!extrapolation.repeats)
+        return extrapolation.type;
+    if (!extrapolation.count)
+        return std::string(extrapolation.type) + " without end";
+    return std::string(extrapolation.type) + ' ' +
+           (*extrapolation.count == 1 ? "once" : std::to_string(*extrapolation.count) + " times");
 }
 
 const char* blendName(const FbxAnimLayer& layer) {
@@ -232,8 +234,8 @@ void printCurve(const Curves& curves, const LayerCurve& each, std::ostream& out,
     for (const KeyFacts& key : keys) {
         table.addRow({shortNumber(curves.frameOf(key.time)), shortNumber(key.time.GetSecondDouble()),
                       exactText(key.value), key.interpolation, key.tangent,
-                      key.leftSlope ? numberText(*key.leftSlope) : "",
-                      key.rightSlope ? numberText(*key.rightSlope) : "", key.remarks()});
+                      key.leftSlope ? floatText(*key.leftSlope) : "", key.rightSlope ? floatText(*key.rightSlope) : "",
+                      key.remarks()});
     }
     table.print(out, terminal, 4);
 }
@@ -248,7 +250,7 @@ void printSamples(const Curves& curves, const Terminal& terminal, std::ostream& 
         const FbxTime time = curves.timeOf(static_cast<double>(frame));
         std::vector<std::string> cells{std::to_string(frame), shortNumber(time.GetSecondDouble())};
         for (ChosenChannel& chosen : curves.channels)
-            cells.push_back(numberText(chosen.channel.valueAt(time)));
+            cells.push_back(floatText(chosen.channel.valueAt(time)));
         table.addRow(std::move(cells));
     }
     table.print(out, terminal, 2);
@@ -292,11 +294,15 @@ void plotChannel(const Curves& curves, ChosenChannel& chosen, Page& page, std::o
     }
     const auto [low, high] = std::minmax_element(values.begin(), values.end());
     const std::string from = std::to_string(curves.range->first), to = std::to_string(curves.range->last);
-    out << '\n' << page.terminal().paint(Ink::name, terminalText(chosen.fullName())) << '\n';
-    out << "  ┌ " << numberText(*high) << '\n';
+    out << '\n' << page.terminal().paint(Ink::name, terminalText(chosen.fullName()));
+    if (*low == *high) {
+        out << "  " << floatText(*low) << " throughout, from frame " << from << " to " << to << '\n';
+        return;
+    }
+    out << "\n  ┌ " << floatText(*high) << '\n';
     for (const std::string& line : brailleLines(values, columns, kRows))
         out << "  " << page.terminal().paint(Ink::number, line) << '\n';
-    out << "  └ " << numberText(*low) << '\n';
+    out << "  └ " << floatText(*low) << '\n';
     out << "  frame " << from
         << std::string(columns > from.size() + to.size() + 6 ? columns - from.size() - to.size() - 6 : 1, ' ') << to
         << '\n';

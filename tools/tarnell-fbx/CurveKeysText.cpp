@@ -80,22 +80,41 @@ KeyFacts factsOf(const FbxAnimCurve& curve, int key) {
     return facts;
 }
 
-Extrapolation extrapolation(FbxAnimCurveBase::EExtrapolationType type, unsigned long count) {
-    constexpr unsigned long kMost = 0x7FFFFFFF; // more means endless
-    const std::optional<long> times = count < kMost ? std::optional(static_cast<long>(count)) : std::nullopt;
+/// Whether the curve stands still on one side of its keys though it moves between them. The API has one number for
+/// keys that come again without end and for those that a file has come again zero times.
+bool standsStillBeside(FbxAnimCurve& curve, bool before) {
+    constexpr long long kProbes = 32;
+    const FbxTime first = curve.KeyGetTime(0), last = curve.KeyGetTime(curve.KeyGetCount() - 1);
+    const long long length = last.Get() - first.Get();
+    const float edge = curve.KeyGetValue(before ? 0 : curve.KeyGetCount() - 1);
+    bool movesInside = false;
+    for (long long i = 1; i < kProbes; ++i) {
+        const long long away = length / kProbes * i;
+        if (curve.Evaluate(FbxTime(before ? first.Get() - away : last.Get() + away)) != edge)
+            return false;
+        movesInside = movesInside || curve.Evaluate(FbxTime(first.Get() + away)) != edge;
+    }
+    return movesInside;
+}
+
+Extrapolation extrapolation(FbxAnimCurve& curve, bool before) {
+    const auto type = before ? curve.GetPreExtrapolation() : curve.GetPostExtrapolation();
+    const unsigned long count = before ? curve.GetPreExtrapolationCount() : curve.GetPostExtrapolationCount();
+    const bool isCounted = count > 0 || (type != FbxAnimCurveBase::eConstant && standsStillBeside(curve, before));
+    const std::optional<long> times = isCounted ? std::optional(static_cast<long>(count)) : std::nullopt;
     switch (type) {
     case FbxAnimCurveBase::eConstant:
-        return {"constant", {}};
+        return {"constant", false, {}};
     case FbxAnimCurveBase::eRepetition:
-        return {"repetition", times};
+        return {"repetition", true, times};
     case FbxAnimCurveBase::eMirrorRepetition:
-        return {"mirror", times};
+        return {"mirror", true, times};
     case FbxAnimCurveBase::eKeepSlope:
-        return {"slope", {}};
+        return {"slope", false, {}};
     case FbxAnimCurveBase::eRelativeRepetition:
-        return {"relative", times};
+        return {"relative", true, times};
     }
-    return {"unknown", {}};
+    return {"unknown", false, {}};
 }
 
 /// Whether a weight differs from the default third; old files have it with four digits.
@@ -114,9 +133,9 @@ std::string KeyFacts::remarks() const {
     if (timeIndependent)
         add("time-independent");
     if (isUnusual(leftWeight))
-        add("left weight " + numberText(*leftWeight));
+        add("left weight " + floatText(*leftWeight));
     if (isUnusual(rightWeight))
-        add("right weight " + numberText(*rightWeight));
+        add("right weight " + floatText(*rightWeight));
     if (tension)
         add("tension " + exactText(*tension) + ", continuity " + exactText(*continuity) + ", bias " + exactText(*bias));
     return text;
@@ -130,13 +149,9 @@ std::vector<KeyFacts> keyFacts(FbxAnimCurve& curve) {
     return facts;
 }
 
-Extrapolation extrapolationBefore(const FbxAnimCurve& curve) {
-    return extrapolation(curve.GetPreExtrapolation(), curve.GetPreExtrapolationCount());
-}
+Extrapolation extrapolationBefore(FbxAnimCurve& curve) { return extrapolation(curve, /*before=*/true); }
 
-Extrapolation extrapolationAfter(const FbxAnimCurve& curve) {
-    return extrapolation(curve.GetPostExtrapolation(), curve.GetPostExtrapolationCount());
-}
+Extrapolation extrapolationAfter(FbxAnimCurve& curve) { return extrapolation(curve, /*before=*/false); }
 
 void printShape(const KeyFacts& key, JsonWriter& json) {
     json.text("interpolation", key.interpolation);

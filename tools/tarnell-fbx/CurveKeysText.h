@@ -31,12 +31,14 @@ struct KeyFacts {
 
 struct Extrapolation {
     const char* type = "constant"; ///< constant, repetition, mirror, slope, relative
-    std::optional<long> count;     ///< of repetitions; none: endless, or where nothing is repeated
+    bool repeats = false;          ///< whether the keys come again
+    std::optional<long> count;     ///< how often; none: without end, or where nothing is repeated
 };
 
 std::vector<KeyFacts> keyFacts(FbxAnimCurve& curve);
-Extrapolation extrapolationBefore(const FbxAnimCurve& curve);
-Extrapolation extrapolationAfter(const FbxAnimCurve& curve);
+/// Of a curve with keys.
+Extrapolation extrapolationBefore(FbxAnimCurve& curve);
+Extrapolation extrapolationAfter(FbxAnimCurve& curve);
 
 /// The keys of a key's JSON object from its interpolation on.
 void printShape(const KeyFacts& key, JsonWriter& json);

@@ -135,12 +135,13 @@ void print(const DiffPage& page, Form form) {
 } // namespace
 
 std::string sentenceOf(const Difference& difference) {
-    std::string text = difference.what;
+    // What is named for its kind needs no name beside it.
+    std::string text = difference.what == diffKindName(difference.kind) ? "" : difference.what;
     if (difference.kind == DiffKind::added || difference.kind == DiffKind::removed)
         return text + ", " + difference.a + difference.b;
     if (!difference.a.empty() || !difference.b.empty())
-        text +=
-            ": " + (difference.a.empty() ? "" : difference.a + ' ') + (difference.b.empty() ? "" : "→ " + difference.b);
+        text += (text.empty() ? "" : ": ") + (difference.a.empty() ? "" : difference.a + ' ') +
+                (difference.b.empty() ? "" : "→ " + difference.b);
     while (!text.empty() && text.back() == ' ')
         text.pop_back();
     if (difference.amount)

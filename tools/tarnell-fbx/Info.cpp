@@ -3,6 +3,7 @@
 //
 // tarnell-fbx info: a summary per file, as text or JSON. These are facts of the file itself, before any
 // conversion, so they come from the platform.
+#include <cmath>
 #include <filesystem>
 #include <map>
 #include <system_error>
@@ -123,10 +124,13 @@ std::string versionText(int version) {
     return version % 100 == 0 ? text : text + '.' + std::to_string(version % 100);
 }
 
+/// To a fraction of any frame.
+std::string secondsText(double seconds) { return numberText(std::round(seconds * 1e4) / 1e4); }
+
 std::string stackText(const Stack& stack) {
     std::string text = inQuotes(stack.name) + "  frames " + std::to_string(stack.firstFrame) + " to " +
-                       std::to_string(stack.lastFrame) + "  (" + numberText(stack.start) + " to " +
-                       numberText(stack.end) + " s)  layers:";
+                       std::to_string(stack.lastFrame) + "  (" + secondsText(stack.start) + " to " +
+                       secondsText(stack.end) + " s)  layers:";
     for (std::size_t i = 0; i < stack.layers.size(); ++i)
         text += (i == 0 ? " " : ", ") + terminalText(stack.layers[i]);
     return text;
@@ -145,8 +149,8 @@ struct TreeLine {
     std::string indent;
 };
 
-/// More nodes than this are counted, not listed.
-constexpr int kMaximumTreeLines = 200;
+/// More nodes than this are counted, not listed: a page is one screen.
+constexpr int kMaximumTreeLines = 40;
 
 void printTree(FbxNode& root, std::ostream& out, const Terminal& terminal) {
     std::vector<TreeLine> pending;
@@ -170,7 +174,7 @@ void printTree(FbxNode& root, std::ostream& out, const Terminal& terminal) {
         pushChildren(*line.node, line.indent.size() < kMaximumIndent ? line.indent + "  " : line.indent);
     }
     if (left > 0)
-        out << "    … and " << left << " more\n";
+        out << "    … and " << left << " more; tarnell-fbx tree has all\n";
 }
 
 void printText(const Facts& facts, FbxNode& root, Page& page) {

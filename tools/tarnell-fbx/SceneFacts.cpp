@@ -7,14 +7,17 @@
 #include <charconv>
 #include <cmath>
 #include <cstdio>
+#include <limits>
 
 #include "TerminalText.h"
 
 namespace tool {
 
 std::string numberText(double value) {
+    if (std::isnan(value))
+        return "nan";
     char text[32];
-    std::snprintf(text, sizeof text, "%.10g", value);
+    std::snprintf(text, sizeof text, "%.10g", value + 0.0); // no minus before a zero
     return text;
 }
 
@@ -26,7 +29,9 @@ namespace {
 
 template <class Real>
 std::string shortest(Real value) {
-    // The shortest form by itself would give 100000 as 1e+05.
+    if (std::isnan(value))
+        return "nan"; // whose sign says nothing
+    // Shortest alone would have 100000 as 1e+05.
     constexpr double kSmall = 1e-5, kLarge = 1e15;
     const double size = std::abs(static_cast<double>(value));
     const bool isUsual = (size >= kSmall && size < kLarge) || size == 0.0;
@@ -40,6 +45,10 @@ std::string shortest(Real value) {
 
 std::string exactText(double value) { return shortest(value); }
 std::string exactText(float value) { return shortest(value); }
+std::string floatText(double value) {
+    const bool fits = std::abs(value) <= static_cast<double>(std::numeric_limits<float>::max());
+    return fits ? shortest(static_cast<float>(value) + 0.0F) : shortest(value);
+}
 
 std::string sizeText(std::uintmax_t bytes) {
     constexpr double kKibi = 1024.0;

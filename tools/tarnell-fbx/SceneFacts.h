@@ -14,6 +14,8 @@ namespace tool {
 
 /// At most ten significant digits, without trailing zeros.
 std::string numberText(double value);
+/// The fewest digits that read back as the same float: for what files keep as floats.
+std::string floatText(double value);
 /// "23.976 frames per second", to four decimals.
 std::string rateText(double framesPerSecond);
 /// The fewest digits that read back as the same number.
