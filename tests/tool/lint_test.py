@@ -4,6 +4,7 @@
 # Every rule of lint has a file of tests/data/lint that is about it and trips it, and clean.fbx, which trips none; every
 # rule is in docs/lint.md with the same words.
 import glob
+import importlib.util
 import json
 import os
 import re
@@ -14,12 +15,15 @@ import unittest
 from support import ROOT, SDK_DATA, SHOT, run
 
 DATA = os.path.join(ROOT, "tests", "data", "lint")
+spec = importlib.util.spec_from_file_location("make_lint_files", os.path.join(DATA, "make_lint_files.py"))
+scenes = importlib.util.module_from_spec(spec)
+spec.loader.exec_module(scenes)
 # All of the files are texts.
 OF_A_TEXT = {"ascii-encoding"}
 # What cannot be had alone.
 ALONG = {"not-readable": {"span-differs-from-keys"},  # a span that long
          "repaired": {"rate-unstated"},  # a custom rate that is worked out
-         "several-takes": {"take-without-keys"}}
+         "take-without-keys": {"several-takes"}}
 # Files with other names: the clean one is a text, and for the rule of texts the other way round.
 TRIPS = {"ascii-encoding": os.path.join(DATA, "clean.fbx")}
 
@@ -104,10 +108,70 @@ class Findings(unittest.TestCase):
                                  ("polygons-out-of-range", "tri", "1 corner names a point beyond the 3 that there are"),
                                  ("cache-unusable", "tri", "4"), ("cache-range", "tri", "from frame 0 to 2"),
                                  ("cache-rate", "tri", "24 frames per second, and the file has 25"),
-                                 ("duplicate-names", "twin", "2 nodes"), ("constraints", None, '"Aim"')):
+                                 ("duplicate-names", "twin", "2 nodes"), ("constraints", None, '"Aim"'),
+                                 ("take-without-keys", "still", "nothing is keyed in the take"),
+                                 ("unparented-nodes", "stray", "nothing holds it, and others hang below it")):
             page, _ = lint(os.path.join(DATA, name + ".fbx"), "--rules", name)
             self.assertEqual([each["object"] for each in page["findings"]], [who], name)
             self.assertIn(words, page["findings"][0]["text"])
+
+    def test_of_takes_name_them(self):
+        rules = "keys-between-frames,far-from-origin,clip-planes,unparented-nodes"
+        text = scenes.with_takes(("run", (0, 4), (0, 2.25, 4)), ("far", (0, 4), (200000, 200004)),
+                                 camera={"NearPlane": 10.0, "FarPlane": 5.0}).replace("200000.0,200004.0", "2e5,2e5")
+        page = json.loads(run("lint", "--json", "--rules", rules, "-", input=text).stdout)
+        found = {(each["rule"], each["object"]): each for each in page["findings"]}
+        self.assertEqual(set(found), {("keys-between-frames", "cam"), ("far-from-origin", "cam"), ("clip-planes", "cam")})
+        self.assertEqual(found["keys-between-frames", "cam"]["takes"], ["run"])
+        self.assertEqual(found["far-from-origin", "cam"]["takes"], ["far"])
+        self.assertEqual(found["clip-planes", "cam"]["takes"], ["shot", "run", "far"])  # once, in all of them
+        lines = run("lint", "--rules", rules, "-", input=text).stdout
+        self.assertIn('the first at 2.25 (in take "run")\n', lines)
+        self.assertIn('floats are 0.0156 cm apart (in take "far")\n', lines)
+        self.assertNotIn('"shot"', lines)  # what holds in every take needs no names
+
+    def test_of_cameras_are_those_of_the_take(self):
+        mesh, film = (20, "Lcl Translation", "d|X"), (2, "FilmOffsetX", "d|FilmOffsetX")
+
+        def takes(first, *others):
+            further = [("b%d" % i, (0, 4), (0, 4), *each) for i, each in enumerate(others)]
+            text = scenes.with_takes(*further, **dict(zip(("on", "animated", "channel"), first)),
+                                     camera={"FilmOffsetX": 0.125})  # keys begin at 0
+            page = json.loads(run("lint", "--json", "--rules", "film-offset", "-", input=text).stdout)
+            return [take for each in page["findings"] for take in each["takes"]]
+        self.assertEqual(takes(mesh, mesh), ["shot", "b0"])
+        self.assertEqual(takes(mesh, film, mesh), ["shot", "b1"])
+        self.assertEqual(takes(film, mesh, film), ["b0"])
+
+    def test_that_depend_on_no_take_name_none(self):
+        page, _ = lint(os.path.join(DATA, "squeezed-film.fbx"))
+        self.assertEqual({tuple(each["takes"]) for each in page["findings"]}, {()})
+
+    def test_of_two_objects_with_one_name_are_two(self):
+        text = scenes.scene(names=("twin", "twin"), camera_node={"Lcl Translation": (0.0, 2e5, 0.0)},
+                            mesh_node={"Lcl Translation": (0.0, 2e5, 0.0)}, keyed=False)
+        page = json.loads(run("lint", "--json", "--rules", "far-from-origin", "-", input=text).stdout)
+        self.assertEqual(len(page["findings"]), 2)
+
+    def test_of_what_nothing_holds_follow_from_the_connections_of_any_version(self):
+        rule = ("--rules", "unparented-nodes")
+        with tempfile.TemporaryDirectory() as folder:
+            for version in ("2010", "2014", "2016"):
+                for form in ("--ascii", "--binary"):
+                    file = os.path.join(folder, f"{version}{form}.fbx")
+                    source = os.path.join(DATA, "unparented-nodes.fbx")
+                    self.assertEqual(run("convert", source, file, "--version", version, form).returncode, 0)
+                    self.assertEqual(lint(file, *rule)[0]["findings"], [], file)  # convert connects it
+                    if form == "--ascii":
+                        with open(file, encoding="utf-8") as stream:
+                            text = stream.read()
+                        link = (re.search(r'\n[^\n]*"Model::stray"[^\n]*"Model::Scene"', text) if version == "2010"
+                                else re.search(r'\n\s*C: "OO",%s,0' % re.search(r'Model: (\d+), "Model::stray"', text)[1],
+                                               text))
+                        result = run("lint", "--json", *rule, "-", input=text.replace(link[0], ""))
+                        self.assertEqual([each["object"] for each in json.loads(result.stdout)["findings"]], ["stray"])
+        views = os.path.join(SDK_DATA, "producer_cameras_6100_ascii.fbx")
+        self.assertEqual(lint(views, *rule)[0]["findings"], [])
 
     def test_of_chosen_rules_only(self):
         file = os.path.join(DATA, "repaired.fbx")

@@ -28,8 +28,7 @@ namespace {
 std::vector<FbxNode*> cameraNodes(FbxScene& scene) {
     std::vector<FbxNode*> nodes;
     for (const TreeNode& each : nodesInOrder(scene)) {
-        FbxCamera* camera = each.node->GetCamera();
-        if (!each.isDetached && camera && !scene.GlobalCameraSettings().IsProducerCamera(camera))
+        if (!each.isDetached && each.node->GetCamera() && !isProducer(*each.node))
             nodes.push_back(each.node);
     }
     return nodes;

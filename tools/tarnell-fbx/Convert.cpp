@@ -176,11 +176,6 @@ private:
         return true;
     }
 
-    bool isProducer(const FbxNode& node) const {
-        const auto* camera = FbxCast<FbxCamera>(node.GetNodeAttribute());
-        return camera && mReader.getScene()->GlobalCameraSettings().IsProducerCamera(camera);
-    }
-
     void addLosses() {
         const bool still = !cachesPoints() && mReader.getFirstFrame() < mReader.getLastFrame();
         mLosses.add(still ? mDeforming : 0, "written as they stand at the first frame (see --frames): moving meshes");

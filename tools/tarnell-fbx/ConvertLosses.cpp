@@ -181,11 +181,6 @@ private:
     }
 };
 
-bool isProducer(FbxScene& scene, const FbxNode& node) {
-    const auto* camera = FbxCast<FbxCamera>(node.GetNodeAttribute());
-    return camera && scene.GlobalCameraSettings().IsProducerCamera(camera);
-}
-
 } // namespace
 
 bool Losses::wants(const char* kind) const {
@@ -200,7 +195,7 @@ void Losses::add(int count, const std::string& what) {
 void Losses::addScene(FbxScene& scene) {
     NodeCounts nodes(scene, *this);
     for (const TreeNode& entry : nodesInOrder(scene)) {
-        if (entry.node->GetParent() && !isProducer(scene, *entry.node) && !isSkewHelper(*entry.node))
+        if (entry.node->GetParent() && !isProducer(*entry.node) && !isSkewHelper(*entry.node))
             nodes.add(*entry.node);
     }
     add(nodes.parents, "written below the root, where they are in the world: objects below others");

@@ -5,6 +5,7 @@
 #pragma once
 
 #include <string>
+#include <unordered_map>
 #include <vector>
 
 #include <fbxsdk.h>
@@ -31,6 +32,30 @@ struct Channel {
 
 /// A property's channels, also those that are not driven. Without a take none is driven.
 std::vector<Channel> channelsOf(const FbxProperty& property, FbxAnimStack* take);
+
+/// Which takes layers belong to, and where they stand in these.
+class TakeLayers {
+public:
+    explicit TakeLayers(const std::vector<FbxAnimStack*>& takes);
+
+    struct Place {
+        std::size_t take; ///< index
+        int layer;        ///< from the base layer up
+    };
+    [[nodiscard]] const std::vector<Place>& placesOf(const FbxAnimLayer& layer) const;
+
+private:
+    std::unordered_map<const FbxAnimLayer*, std::vector<Place>> mPlaces;
+};
+
+/// A channel as one take drives it.
+struct TakeChannel {
+    std::size_t take; ///< index
+    Channel channel;
+};
+
+/// A property's channels that have keys, take by take: one pass, however many takes there are.
+std::vector<TakeChannel> keyedChannels(const FbxProperty& property, const TakeLayers& layers);
 
 /// How many keys all curves of the property have in the take.
 int keyCount(const FbxProperty& property, FbxAnimStack* take);

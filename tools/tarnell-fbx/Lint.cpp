@@ -44,29 +44,28 @@ std::string summary(const std::vector<Finding>& findings) {
 /// Of a rule that finds more, the rest are counted.
 constexpr std::size_t kMostShown = 20;
 
-void printRule(const LintRule& rule, const std::vector<Finding>& findings, std::ostream& out,
-               const Terminal& terminal) {
+void printRule(const LintRule& rule, const LintFindings& findings, std::ostream& out, const Terminal& terminal) {
     out << "  " << terminal.paint(inkOf(rule.severity), severityName(rule.severity)) << "  "
         << terminal.paint(Ink::name, rule.id) << '\n';
     std::size_t count = 0;
-    for (const Finding& finding : findings) {
+    for (const Finding& finding : findings.all) {
         if (finding.rule != &rule || ++count > kMostShown)
             continue;
-        out << "    " << (finding.object.empty() ? "" : inQuotes(finding.object) + ": ") << terminalText(finding.text)
-            << '\n';
+        out << "    " << (finding.object.empty() ? "" : inQuotes(finding.object) + ": ")
+            << terminalText(finding.sentence(findings.takeCount)) << '\n';
     }
     if (count > kMostShown)
         out << "    … and " << count - kMostShown << " more; --json has all\n";
     out << "    " << terminal.paint(Ink::faint, rule.reason) << "\n    → " << rule.remedy << '\n';
 }
 
-void printText(const std::vector<Finding>& findings, Page& page) {
+void printText(const LintFindings& findings, Page& page) {
     std::ostream& out = page.begin();
-    out << page.terminal().paint(Ink::heading, spoken(page.file())) << "  " << summary(findings) << '\n';
+    out << page.terminal().paint(Ink::heading, spoken(page.file())) << "  " << summary(findings.all) << '\n';
     for (const Severity severity : {Severity::error, Severity::warning, Severity::note}) {
         for (const LintRule& rule : lintRules()) {
-            const bool found =
-                std::any_of(findings.begin(), findings.end(), [&](const Finding& each) { return each.rule == &rule; });
+            const bool found = std::any_of(findings.all.begin(), findings.all.end(),
+                                           [&](const Finding& each) { return each.rule == &rule; });
             if (found && rule.severity == severity)
                 printRule(rule, findings, out, page.terminal());
         }
@@ -98,6 +97,11 @@ void printJson(const std::vector<Finding>& findings, JsonWriter& json) {
             json.text(finding.object);
         }
         json.text("text", finding.text);
+        json.key("takes");
+        json.beginArray();
+        for (const std::string& take : finding.takes)
+            json.text(take);
+        json.endArray();
         json.endObject();
     }
     json.endArray();
@@ -130,13 +134,13 @@ int lint(const LintOptions& options) {
         return listRules(options.form);
     return showFiles(options, "lint", [&options](Page& page) -> int {
         const SceneFile opened(page.file());
-        const std::vector<Finding> findings = lintFindings(page.file(), opened, options.rules);
+        const LintFindings findings = lintFindings(page.file(), opened, options.rules);
         if (page.isJson()) {
-            page.json("lint", [&](JsonWriter& json) { printJson(findings, json); });
+            page.json("lint", [&](JsonWriter& json) { printJson(findings.all, json); });
         } else {
             printText(findings, page);
         }
-        return statusOf(findings);
+        return statusOf(findings.all);
     });
 }
 

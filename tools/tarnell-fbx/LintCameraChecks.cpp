@@ -15,7 +15,7 @@ namespace tool {
 namespace {
 
 CameraMoment firstMoment(const LintContext& context, const CameraFacts& camera) {
-    return camera.at(static_cast<double>(context.first.firstFrame));
+    return camera.at(static_cast<double>(context.take.firstFrame));
 }
 
 const FbxCamera& attributeOf(const CameraFacts& camera) { return *camera.node->GetCamera(); }
@@ -25,7 +25,7 @@ bool isPositive(double number) { return std::isfinite(number) && number > 0.0; }
 } // namespace
 
 void lensOutOfRange(const LintContext& context, LintReport& report) {
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         const CameraMoment moment = firstMoment(context, camera);
         if (!isPositive(moment.focalLength) && !camera.orthographic)
             report.add(camera.name, "a focal length of " + significant(moment.focalLength, 6) + " mm is none");
@@ -36,7 +36,7 @@ void lensOutOfRange(const LintContext& context, LintReport& report) {
 
 void lensValuesDisagree(const LintContext& context, LintReport& report) {
     constexpr double kDegrees = 0.01, kMillimetres = 0.01;
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         if (camera.orthographic)
             continue;
         const CameraMoment moment = firstMoment(context, camera);
@@ -61,7 +61,7 @@ void lensValuesDisagree(const LintContext& context, LintReport& report) {
 
 void filmShapeDiffers(const LintContext& context, LintReport& report) {
     constexpr double kTolerance = 0.005;
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         const CameraMoment moment = firstMoment(context, camera);
         const double film = moment.film.aspect();
         if (camera.orthographic || !camera.resolutionStated || camera.pictureAspect <= 0.0 || !isPositive(film) ||
@@ -80,7 +80,7 @@ void filmShapeDiffers(const LintContext& context, LintReport& report) {
 }
 
 void filmFormatDisagrees(const LintContext& context, LintReport& report) {
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         for (const IdleValue& idle : camera.idle) {
             const FbxProperty property = attributeOf(camera).FindProperty(idle.property.c_str());
             if ((idle.property == "FilmFormatIndex" || idle.property == "FilmAspectRatio") &&
@@ -91,14 +91,14 @@ void filmFormatDisagrees(const LintContext& context, LintReport& report) {
 }
 
 void squeezedFilm(const LintContext& context, LintReport& report) {
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         if (camera.squeeze != 1.0)
             report.add(camera.name, "the squeeze ratio is " + rounded(camera.squeeze, 4));
     }
 }
 
 void filmOffset(const LintContext& context, LintReport& report) {
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         const CameraMoment moment = firstMoment(context, camera);
         if (moment.offsetX != 0.0 || moment.offsetY != 0.0)
             report.add(camera.name, "the film is shifted by " + rounded(moment.offsetX, 6) + " × " +
@@ -107,7 +107,7 @@ void filmOffset(const LintContext& context, LintReport& report) {
 }
 
 void clipPlanes(const LintContext& context, LintReport& report) {
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         const CameraMoment moment = firstMoment(context, camera);
         const bool nearIsOne = camera.orthographic ? std::isfinite(moment.nearPlane) : isPositive(moment.nearPlane);
         if (!nearIsOne || !(moment.farPlane > moment.nearPlane))
@@ -119,7 +119,7 @@ void clipPlanes(const LintContext& context, LintReport& report) {
 void clipPlanesFarApart(const LintContext& context, LintReport& report) {
     // A float has 24 bits: with planes further apart most of its precision is used close to the camera.
     constexpr double kMostRatio = 16777216.0;
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         const CameraMoment moment = firstMoment(context, camera);
         if (!camera.orthographic && isPositive(moment.nearPlane) && moment.farPlane / moment.nearPlane > kMostRatio)
             report.add(camera.name, "the far plane is " + significant(moment.farPlane / moment.nearPlane, 3) +
@@ -129,7 +129,7 @@ void clipPlanesFarApart(const LintContext& context, LintReport& report) {
 
 void cameraScale(const LintContext& context, LintReport& report) {
     constexpr double kTolerance = 1e-3;
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         const auto [least, most] = std::minmax_element(camera.scale.begin(), camera.scale.end());
         if (*least < 0.0 || *most - *least > kTolerance * std::abs(*most))
             report.add(camera.name, "it is scaled by " + vectorText(camera.scale, 4));
@@ -137,7 +137,7 @@ void cameraScale(const LintContext& context, LintReport& report) {
 }
 
 void rollWithoutTarget(const LintContext& context, LintReport& report) {
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         if (!camera.hasTarget && attributeOf(camera).Roll.Get() != 0.0)
             report.add(camera.name, "a roll of " + rounded(attributeOf(camera).Roll.Get(), 4) +
                                         "°, and no target: the node turns the camera");
@@ -145,7 +145,7 @@ void rollWithoutTarget(const LintContext& context, LintReport& report) {
 }
 
 void interestElsewhere(const LintContext& context, LintReport& report) {
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         const CameraMoment moment = firstMoment(context, camera);
         if (!camera.hasTarget && extensions::isStated(attributeOf(camera).InterestPosition) &&
             !moment.looksAtInterest())
@@ -157,7 +157,7 @@ void interestElsewhere(const LintContext& context, LintReport& report) {
 void imageShiftNotRead(const LintContext& context, LintReport& report) {
     const std::string shifting[] = {"OpticalCenterX", "OpticalCenterY", "FilmTranslateX",
                                     "FilmTranslateY", "FilmRollValue",  "PreScale"};
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         for (const IdleValue& idle : camera.idle) {
             if (std::find(std::begin(shifting), std::end(shifting), idle.property) != std::end(shifting))
                 report.add(camera.name, idle.property + " is " + idle.shortValue);
@@ -166,7 +166,7 @@ void imageShiftNotRead(const LintContext& context, LintReport& report) {
 }
 
 void noResolution(const LintContext& context, LintReport& report) {
-    for (const CameraFacts& camera : context.cameras.cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras) {
         if (camera.pictureAspect <= 0.0) {
             report.add(camera.name, "a picture of " + rounded(camera.resolution[0], 3) + " × " +
                                         rounded(camera.resolution[1], 3) + " is none");

@@ -5,7 +5,9 @@
 #pragma once
 
 #include <functional>
+#include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include <fbxsdk/extensions/RecordFile.h>
@@ -18,7 +20,7 @@
 
 namespace tool {
 
-/// A number that keys drive in the first take.
+/// A number that keys drive in a take.
 struct KeyedChannel {
     const FbxObject* object;
     Channel channel;
@@ -30,27 +32,32 @@ struct LintContext {
     const SceneFile& file;
     std::vector<FbxAnimStack*> stacks;
     std::vector<TakeFacts> takes; ///< of the stacks
-    TakeFacts first;              ///< the first take, or a default without one
     std::vector<TreeNode> nodes;
     std::vector<FbxObject*> objects;
     std::vector<FbxMesh*> meshes;
-    std::vector<KeyedChannel> channels;
-    CameraList cameras;
-    std::string unreadable; ///< why the library cannot read the file faithfully
+    std::vector<std::vector<KeyedChannel>> channelsByTake; ///< as `takes`
+
+    // Of the take that is looked at; of the first one where the file is.
+    TakeFacts take; ///< what there is without one where the file has none
+    const std::vector<KeyedChannel>* channels = nullptr;
+    std::shared_ptr<const CameraList> cameras;
+    std::string unreadable; ///< why the library cannot read the take faithfully
 
     [[nodiscard]] FbxScene& scene() const { return file.scene(); }
     [[nodiscard]] double unit() const { return scene().GetGlobalSettings().GetSystemUnit().GetScaleFactor(); }
     /// The node in the file's world, at the first frame of the take.
     [[nodiscard]] FbxAMatrix worldOf(FbxNode& node) const;
+    /// Opened when first asked for. Throws Unreadable.
+    [[nodiscard]] const extensions::RecordFile& records() const;
+
+    mutable std::unique_ptr<extensions::RecordFile> openedRecords;
 };
 
 struct LintReport {
     const LintRule* rule = nullptr;
     std::vector<Finding> findings;
-    void add(const std::string& object, std::string text) { findings.push_back({rule, object, std::move(text)}); }
+    void add(const std::string& object, std::string text) { findings.push_back({rule, object, std::move(text), {}}); }
 };
-
-using LintCheck = void(const LintContext& context, LintReport& report);
 
 // Time.
 LintCheck rateUnstated, keysBetweenFrames, spanDiffersFromKeys, takeWithoutSpan, takeWithoutKeys, severalTakes,
@@ -60,9 +67,9 @@ LintCheck lensOutOfRange, lensValuesDisagree, filmShapeDiffers, filmFormatDisagr
     clipPlanes, clipPlanesFarApart, cameraScale, rollWithoutTarget, interestElsewhere, imageShiftNotRead, noResolution;
 // The file, and placement.
 LintCheck notReadable, repaired, oldVersion, asciiEncoding, unitShiftsOptics, axesShiftOptics, leftHanded,
-    farFromOrigin, meshAtOrigin, zeroScale, mirroredNode, shearedNode, inheritedScale, notFinite;
+    farFromOrigin, meshAtOrigin, zeroScale, mirroredNode, shearedNode, inheritedScale, valuesNotFinite, keysNotFinite;
 // Names and structure.
-LintCheck duplicateNames, unnamedNodes, oddNames, constraints, curveThatStopsThreeJs;
+LintCheck duplicateNames, unnamedNodes, oddNames, unparentedNodes, constraints, curveThatStopsThreeJs;
 // Meshes and caches.
 LintCheck polygonsOutOfRange, smallPolygons, meshWithoutPolygons, meshWithoutNormals, cacheMissing, cacheForeignPath,
     cacheUnusable, cacheRange, cacheRate;
@@ -70,8 +77,11 @@ LintCheck polygonsOutOfRange, smallPolygons, meshWithoutPolygons, meshWithoutNor
 /// The name of the object for display: a camera or mesh by its node.
 std::string nameOf(const FbxObject& object);
 
-/// The records of the file's objects, unchanged: including what the scene cannot hold, or has repaired.
-void forEachObjectRecord(const std::string& file, const std::function<void(const extensions::FileRecord&)>& work);
+/// The records of the file's objects, as they stand in it: what the scene has no place for, or has mended already.
+void forEachObjectRecord(const extensions::RecordFile& file,
+                         const std::function<void(const extensions::FileRecord&)>& work);
+/// An object's name without its class: "Geometry::tri" in a text, with the two the other way round in a binary file.
+std::string plainName(std::string_view name);
 
 /// "1 key", "3 keys".
 template <class Count>

@@ -32,15 +32,12 @@ std::size_t numberCount(const extensions::FileRecord& record) {
     return value.type == extensions::RecordValue::eList ? value.count : record.valueCount();
 }
 
-/// The name without its class: "Geometry::tri" in an ASCII file, with the two in reverse order in a binary file.
 std::string objectName(const extensions::FileRecord& record) {
     for (std::size_t i = 0; i < record.valueCount(); ++i) {
         const extensions::RecordValue value = record.value(i);
         if (value.type != extensions::RecordValue::eText)
             continue;
-        const std::string text(value.text);
-        const std::size_t binary = text.find(std::string("\0\x01", 2)), colons = text.find("::");
-        return binary != text.npos ? text.substr(0, binary) : colons != text.npos ? text.substr(colons + 2) : text;
+        return plainName(value.text);
     }
     return {};
 }
@@ -80,7 +77,7 @@ bool readFacts(const UsedCache& used, extensions::CacheFacts& facts) {
 } // namespace
 
 void polygonsOutOfRange(const LintContext& context, LintReport& report) {
-    forEachObjectRecord(context.fileName, [&report](const extensions::FileRecord& record) {
+    forEachObjectRecord(context.records(), [&report](const extensions::FileRecord& record) {
         const extensions::FileRecord points = childOf(record, "Vertices");
         const extensions::FileRecord corners = childOf(record, "PolygonVertexIndex");
         if (!points || !corners)
@@ -165,16 +162,16 @@ void cacheUnusable(const LintContext& context, LintReport& report) {
 void cacheRange(const LintContext& context, LintReport& report) {
     forEachCache(context, [&](const UsedCache& used) {
         extensions::CacheFacts facts;
-        if (!context.first.exists || !readFacts(used, facts))
+        if (!context.take.exists || !readFacts(used, facts))
             return;
-        const double toFrames = facts.frameRate > 0.0 ? context.first.frameRate / facts.frameRate : 1.0;
+        const double toFrames = facts.frameRate > 0.0 ? context.take.frameRate / facts.frameRate : 1.0;
         const double first = facts.samples.front().frame * toFrames, last = facts.samples.back().frame * toFrames;
         constexpr double kHalfAFrame = 0.5;
-        if (first > static_cast<double>(context.first.firstFrame) + kHalfAFrame ||
-            last < static_cast<double>(context.first.lastFrame) - kHalfAFrame)
+        if (first > static_cast<double>(context.take.firstFrame) + kHalfAFrame ||
+            last < static_cast<double>(context.take.lastFrame) - kHalfAFrame)
             report.add(nameOf(*used.mesh), "samples from frame " + rounded(first, 3) + " to " + rounded(last, 3) +
-                                               ", and the take goes from " + std::to_string(context.first.firstFrame) +
-                                               " to " + std::to_string(context.first.lastFrame));
+                                               ", and the take goes from " + std::to_string(context.take.firstFrame) +
+                                               " to " + std::to_string(context.take.lastFrame));
     });
 }
 
@@ -184,9 +181,9 @@ void cacheRate(const LintContext& context, LintReport& report) {
         // Times of Maya caches are whole parts of 1/6000 second.
         constexpr double kTolerance = 0.02;
         if (readFacts(used, facts) && facts.frameRate > 0.0 &&
-            std::abs(facts.frameRate - context.first.frameRate) > kTolerance)
+            std::abs(facts.frameRate - context.take.frameRate) > kTolerance)
             report.add(nameOf(*used.mesh),
-                       rateText(facts.frameRate) + ", and the file has " + rateText(context.first.frameRate));
+                       rateText(facts.frameRate) + ", and the file has " + rateText(context.take.frameRate));
     });
 }
 

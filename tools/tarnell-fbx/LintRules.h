@@ -17,13 +17,15 @@ const char* severityName(Severity severity);
 
 struct LintContext;
 struct LintReport;
+using LintCheck = void(const LintContext& context, LintReport& report);
 
 struct LintRule {
     const char* id; ///< stable, "keys-between-frames"
     Severity severity;
-    const char* reason; ///< why it matters
-    const char* remedy; ///< what to do
-    void (*check)(const LintContext&, LintReport&);
+    const char* reason;     ///< why it matters
+    const char* remedy;     ///< what to do
+    LintCheck* check;       ///< of the file; null where all depends on the take
+    LintCheck* checkInTake; ///< of each take, or once where there is none; null where nothing depends on it
 };
 
 /// All rules, in the order in which findings are reported.
@@ -33,11 +35,19 @@ struct Finding {
     const LintRule* rule = nullptr;
     std::string object; ///< the name of the object it is about; empty for the file as a whole
     std::string text;
+    std::vector<std::string> takes; ///< that it holds in; empty where it depends on none
+
+    /// The text, and the takes it holds in where these are not all `takeCount` of the file.
+    [[nodiscard]] std::string sentence(std::size_t takeCount) const;
 };
 
-/// The findings of the rules in a file, of all of them or those with the ids. Values are those of a faithful read of
-/// the first take.
-std::vector<Finding> lintFindings(const std::string& file, const SceneFile& opened,
-                                  const std::vector<std::string>& ids = {});
+struct LintFindings {
+    std::vector<Finding> all; ///< in the order of the rules
+    std::size_t takeCount = 0;
+};
+
+/// What the rules find in a file, all of them or those with the ids. Values are those of faithful reads of each take,
+/// at its first frame where they change.
+LintFindings lintFindings(const std::string& file, const SceneFile& opened, const std::vector<std::string>& ids = {});
 
 } // namespace tool

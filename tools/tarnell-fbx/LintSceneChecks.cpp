@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cmath>
 #include <map>
+#include <set>
 
 #include <fbxsdk/extensions/FileFacts.h>
 
@@ -21,7 +22,7 @@ namespace {
 const FbxIOFileHeaderInfo& headerOf(const LintContext& context) { return *context.file.importer().GetFileHeaderInfo(); }
 
 bool hasOptics(const LintContext& context) {
-    return !context.cameras.cameras.empty() ||
+    return !context.cameras->cameras.empty() ||
            std::any_of(context.nodes.begin(), context.nodes.end(),
                        [](const TreeNode& each) { return each.node->GetLight() != nullptr; });
 }
@@ -65,6 +66,44 @@ bool isFinite(const FbxProperty& property) {
             return false;
     }
     return true;
+}
+
+/// Applications keep their own views outside of the tree.
+bool isOfViews(const FbxNode& node) {
+    const FbxNodeAttribute* attribute = node.GetNodeAttribute();
+    return isProducer(node) || (attribute && attribute->GetAttributeType() == FbxNodeAttribute::eCameraSwitcher);
+}
+
+bool isText(const extensions::RecordValue& value) { return value.type == extensions::RecordValue::eText; }
+
+/// How connections name an object: by its number, or before 7.0 by its name.
+std::string spellingOf(const extensions::RecordValue& value) {
+    return isText(value) ? plainName(value.text) : std::to_string(value.integer);
+}
+std::string spellingOf(const FbxNode& node, bool hasIds) {
+    return hasIds ? std::to_string(extensions::fileIdOf(node)) : std::string(node.GetName());
+}
+
+/// The spellings of what the file puts below the root or another node.
+std::set<std::string> heldModels(const extensions::RecordFile& file) {
+    std::set<std::string> models{"0"};
+    forEachObjectRecord(file, [&models](const extensions::FileRecord& record) {
+        if (record.name() == "Model")
+            models.insert(spellingOf(record.value(0)));
+    });
+    const auto isModel = [&models](const extensions::RecordValue& value) {
+        return isText(value) ? value.text.starts_with("Model::") || value.text.ends_with("\x01Model")
+                             : models.contains(spellingOf(value));
+    };
+    std::set<std::string> held;
+    for (extensions::FileRecord top = file.first(); top; top = top.nextSibling()) {
+        for (extensions::FileRecord each = top.firstChild(); top.name() == "Connections" && each;
+             each = each.nextSibling()) {
+            if (each.valueCount() == 3 && each.value(0).text == "OO" && isModel(each.value(2)))
+                held.insert(spellingOf(each.value(1)));
+        }
+    }
+    return held;
 }
 
 int badKeys(const Channel& channel) {
@@ -191,7 +230,7 @@ void inheritedScale(const LintContext& context, LintReport& report) {
     }
 }
 
-void notFinite(const LintContext& context, LintReport& report) {
+void valuesNotFinite(const LintContext& context, LintReport& report) {
     for (const FbxObject* object : context.objects) {
         for (const FbxProperty& property : propertiesOf(*object)) {
             if (extensions::isStated(property) && !isFinite(property))
@@ -199,16 +238,19 @@ void notFinite(const LintContext& context, LintReport& report) {
                            std::string(property.GetHierarchicalName().Buffer()) + " is " + valueText(property));
         }
     }
-    for (const KeyedChannel& keyed : context.channels) {
-        const int bad = badKeys(keyed.channel);
-        if (bad > 0)
-            report.add(nameOf(*keyed.object),
-                       keyed.fullName() + ": " + countOf(bad, "key is", "keys are") + " not finite");
-    }
     for (FbxMesh* mesh : context.meshes) {
         const int bad = badPoints(*mesh);
         if (bad > 0)
             report.add(nameOf(*mesh), countOf(bad, "point is", "points are") + " not finite");
+    }
+}
+
+void keysNotFinite(const LintContext& context, LintReport& report) {
+    for (const KeyedChannel& keyed : *context.channels) {
+        const int bad = badKeys(keyed.channel);
+        if (bad > 0)
+            report.add(nameOf(*keyed.object),
+                       keyed.fullName() + ": " + countOf(bad, "key is", "keys are") + " not finite");
     }
 }
 
@@ -238,9 +280,23 @@ void oddNames(const LintContext& context, LintReport& report) {
     }
 }
 
+void unparentedNodes(const LintContext& context, LintReport& report) {
+    constexpr int kOldestWithConnections = 6000; // older files have their tree in the nodes
+    if (headerOf(context).mFileVersion < kOldestWithConnections)
+        return;
+    const std::set<std::string> held = heldModels(context.records());
+    for (const TreeNode& each : context.nodes) {
+        // The platform places at the root what nothing holds.
+        if (each.depth == 0 && !isOfViews(*each.node) && !held.contains(spellingOf(*each.node, context.file.hasIds())))
+            report.add(each.node->GetName(), each.node->GetChildCount() == 0
+                                                 ? "nothing holds it"
+                                                 : "nothing holds it, and others hang below it");
+    }
+}
+
 void constraints(const LintContext& context, LintReport& report) {
     std::map<std::string, std::size_t> kinds;
-    forEachObjectRecord(context.fileName, [&kinds](const extensions::FileRecord& record) {
+    forEachObjectRecord(context.records(), [&kinds](const extensions::FileRecord& record) {
         if (record.name().rfind("Constraint", 0) == 0 && record.valueCount() > 0)
             ++kinds[std::string(record.value(record.valueCount() - 1).text)];
     });
@@ -249,7 +305,7 @@ void constraints(const LintContext& context, LintReport& report) {
 }
 
 void curveThatStopsThreeJs(const LintContext& context, LintReport& report) {
-    for (const KeyedChannel& keyed : context.channels) {
+    for (const KeyedChannel& keyed : *context.channels) {
         const std::string property = keyed.channel.property.GetName().Buffer();
         const bool stops = (keyed.object->Is<FbxLight>() && property == "Color") ||
                            (keyed.object->Is<FbxCamera>() && (property == "FilmOffsetX" || property == "FilmOffsetY"));

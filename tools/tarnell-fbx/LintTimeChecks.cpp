@@ -1,7 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Checks of rates, takes and keys.
+// Rates, takes and keys.
+#include <algorithm>
 #include <cmath>
 
 #include "CameraOrigins.h"
@@ -25,7 +26,7 @@ void rateUnstated(const LintContext& context, LintReport& report) {
     if (context.stacks.empty())
         return;
     if (settings.GetTimeMode() == FbxTime::eDefaultMode)
-        report.add("", "the time mode is 0, the application's default; read as " + rateText(context.first.frameRate));
+        report.add("", "the time mode is 0, the application's default; read as " + rateText(context.take.frameRate));
     for (const FbxString& warning : context.file.importer().GetFileHeaderInfo()->mWarnings) {
         const std::string text = warning.Buffer();
         if (text.find("states no frame rate") != std::string::npos)
@@ -34,12 +35,12 @@ void rateUnstated(const LintContext& context, LintReport& report) {
 }
 
 void keysBetweenFrames(const LintContext& context, LintReport& report) {
-    for (const KeyedChannel& keyed : context.channels) {
+    for (const KeyedChannel& keyed : *context.channels) {
         std::size_t between = 0, all = 0;
         double example = 0.0;
         for (const LayerCurve& each : keyed.channel.curves) {
             for (int i = 0; i < each.curve->KeyGetCount(); ++i, ++all) {
-                const double frame = each.curve->KeyGetTime(i).GetSecondDouble() * context.first.frameRate;
+                const double frame = each.curve->KeyGetTime(i).GetSecondDouble() * context.take.frameRate;
                 if (std::abs(frame - std::round(frame)) <= kFrameTolerance)
                     continue;
                 example = between++ == 0 ? frame : example;
@@ -75,16 +76,20 @@ void takeWithoutSpan(const LintContext& context, LintReport& report) {
 }
 
 void takeWithoutKeys(const LintContext& context, LintReport& report) {
-    for (const TakeFacts& take : context.takes) {
-        if (!take.keys)
-            report.add(take.name, "nothing is keyed in the take");
+    const auto& channels = context.channelsByTake;
+    // Nothing takes the place of anything in a scene that stands still.
+    if (std::all_of(channels.begin(), channels.end(), [](const auto& each) { return each.empty(); }))
+        return;
+    for (std::size_t i = 0; i < context.takes.size(); ++i) {
+        if (channels[i].empty())
+            report.add(context.takes[i].name, "nothing is keyed in the take");
     }
 }
 
 void severalTakes(const LintContext& context, LintReport& report) {
     if (context.takes.size() > 1)
         report.add("", "the file has " + std::to_string(context.takes.size()) + " takes; the first is " +
-                           inQuotes(context.first.name));
+                           inQuotes(context.takes.front().name));
 }
 
 void severalLayers(const LintContext& context, LintReport& report) {
@@ -97,15 +102,15 @@ void severalLayers(const LintContext& context, LintReport& report) {
 
 void rotationFlips(const LintContext& context, LintReport& report) {
     constexpr double kHalfATurn = 180.0, kOneFrame = 1.01;
-    for (const KeyedChannel& keyed : context.channels) {
+    for (const KeyedChannel& keyed : *context.channels) {
         if (keyed.channel.property.GetName() != FbxString("Lcl Rotation"))
             continue;
         std::size_t flips = 0;
         std::string example;
         for (const LayerCurve& each : keyed.channel.curves) {
             for (int i = 1; i < each.curve->KeyGetCount(); ++i) {
-                const double from = each.curve->KeyGetTime(i - 1).GetSecondDouble() * context.first.frameRate;
-                const double to = each.curve->KeyGetTime(i).GetSecondDouble() * context.first.frameRate;
+                const double from = each.curve->KeyGetTime(i - 1).GetSecondDouble() * context.take.frameRate;
+                const double to = each.curve->KeyGetTime(i).GetSecondDouble() * context.take.frameRate;
                 const auto before = static_cast<double>(each.curve->KeyGetValue(i - 1));
                 const auto after = static_cast<double>(each.curve->KeyGetValue(i));
                 if (to - from > kOneFrame || std::abs(after - before) < kHalfATurn)

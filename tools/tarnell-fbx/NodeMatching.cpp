@@ -164,8 +164,7 @@ private:
 std::vector<FbxNode*> nodesOfTree(FbxScene& scene) {
     std::vector<FbxNode*> nodes;
     for (const TreeNode& each : nodesInOrder(scene)) {
-        FbxCamera* camera = each.node->GetCamera();
-        if (!each.isDetached && !(camera && scene.GlobalCameraSettings().IsProducerCamera(camera)))
+        if (!each.isDetached && !isProducer(*each.node))
             nodes.push_back(each.node);
     }
     return nodes;

@@ -63,8 +63,9 @@ public:
         mJson.endArray();
     }
 
-    /// The findings of `lint`, rule by rule.
-    void findings(const std::vector<Finding>& findings) {
+    /// What `lint` finds, rule by rule.
+    void findings(const LintFindings& found) {
+        const std::vector<Finding>& findings = found.all;
         mJson.key("findings");
         mJson.beginArray();
         for (const LintRule& rule : lintRules()) {
@@ -77,7 +78,7 @@ public:
             mJson.text("reason", rule.reason);
             mJson.text("remedy", rule.remedy);
             mJson.integer("count", std::count_if(findings.begin(), findings.end(), isIts));
-            printTexts(rule, findings);
+            printTexts(rule, found);
             mJson.endObject();
         }
         mJson.endArray();
@@ -92,16 +93,16 @@ public:
     }
 
 private:
-    void printTexts(const LintRule& rule, const std::vector<Finding>& findings) {
+    void printTexts(const LintRule& rule, const LintFindings& findings) {
         mJson.key("found");
         mJson.beginArray();
         int left = kMostFindings;
-        for (const Finding& finding : findings) {
+        for (const Finding& finding : findings.all) {
             if (finding.rule != &rule || left-- <= 0)
                 continue;
             mJson.beginObject();
             mJson.text("object", finding.object);
-            mJson.text("text", finding.text);
+            mJson.text("text", finding.sentence(findings.takeCount));
             mJson.endObject();
         }
         mJson.endArray();

@@ -53,6 +53,11 @@ bool isAnimated(const FbxProperty& property) {
     return false;
 }
 
+bool isProducer(const FbxNode& node) {
+    const auto* camera = FbxCast<FbxCamera>(node.GetNodeAttribute());
+    return camera && node.GetScene()->GlobalCameraSettings().IsProducerCamera(camera);
+}
+
 bool isSkewHelper(const FbxNode& node) {
     if (node.GetNodeAttribute() || node.GetChildCount() != 1)
         return false;

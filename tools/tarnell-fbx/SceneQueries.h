@@ -28,7 +28,10 @@ std::vector<TreeNode> nodesInOrder(FbxScene& scene);
 /// Whether any curve of any take drives the property.
 bool isAnimated(const FbxProperty& property);
 
-/// Whether a faithful write created the node only to skew the one below it, as it does on every write.
+/// Whether the node is a camera of the application's own views.
+bool isProducer(const FbxNode& node);
+
+/// Whether a faithful write made the node only to skew the one below it, as it does wherever that is written again.
 bool isSkewHelper(const FbxNode& node);
 
 /// The object's properties in their order, those of compounds after the compound.

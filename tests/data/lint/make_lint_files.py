@@ -128,6 +128,23 @@ def with_nulls(*nulls, below=()):
                  connections="".join('C: "OO",%d,%d\n' % (each[0], parents.get(each[0], 0)) for each in nulls))
 
 
+def with_takes(*takes, **more):
+    """Further takes (name, span, frames at which something is keyed, or None, and what: number, property, channel), 30
+    numbers to each."""
+    objects, connections = "", ""
+    for place, (name, span, frames, *what) in enumerate(takes):
+        first = 30 * (place + 1)
+        objects += take(first, name, span, 24) + record("AnimationLayer", first + 1, "AnimLayer::" + name, "")
+        connections += 'C: "OO",%d,%d\n' % (first + 1, first)
+        if frames:
+            on, animated, channel = what or (1, "Lcl Translation", "d|X")
+            objects += record("AnimationCurveNode", first + 2, "AnimCurveNode::T", "", {channel: 0.0})
+            objects += curve(first + 3, frames, [float(frame) for frame in frames], 24)
+            connections += ('C: "OO",%d,%d\nC: "OP",%d,%d, "%s"\nC: "OP",%d,%d, "%s"\n'
+                            % (first + 2, first + 1, first + 2, on, animated, first + 3, first + 2, channel))
+    return scene(objects=objects, connections=connections, **more)
+
+
 Z_UP = (("UpAxis", 2), ("UpAxisSign", 1), ("FrontAxis", 1), ("FrontAxisSign", -1), ("CoordAxis", 0),
             ("CoordAxisSign", 1))
 
@@ -144,10 +161,8 @@ FILES = {
     "keys-between-frames": lambda: scene(frames=(0, 1, 2.25, 3, 4)),
     "span-differs-from-keys": lambda: scene(span=(0, 10)),
     "take-without-span": lambda: scene(span=(0, 0)),
-    "take-without-keys": lambda: scene(keyed=False),
-    "several-takes": lambda: scene(
-        objects=take(30, "other", (0, 4), 24) + record("AnimationLayer", 31, "AnimLayer::other", ""),
-        connections='C: "OO",31,30\n'),
+    "take-without-keys": lambda: with_takes(("still", (0, 4), None)),
+    "several-takes": lambda: with_takes(("other", (0, 4), (0, 1, 2, 3, 4))),
     "several-layers": lambda: scene(objects=record("AnimationLayer", 31, "AnimLayer::more", ""),
                                     connections='C: "OO",31,10\n'),
     "rotation-flips": lambda: scene(animated="Lcl Rotation", values=[170.0, 175.0, 180.0, -175.0, -170.0],
@@ -178,6 +193,7 @@ FILES = {
     "duplicate-names": lambda: scene(names=("twin", "twin")),
     "unnamed-nodes": lambda: scene(names=("cam", "")),
     "odd-names": lambda: scene(names=("cam", "tri\x07")),
+    "unparented-nodes": lambda: scene(objects=null(30, "stray") + null(31, "below"), connections='C: "OO",31,30\n'),
     "constraints": lambda: scene(objects=record("Constraint", 30, "Constraint::aim", "Aim")),
     "curve-that-stops-three-js": lambda: scene(animated="FilmOffsetX", channel="d|FilmOffsetX", on=2,
                                                values=[0.0, 0.1, 0.2, 0.3, 0.4]),

@@ -1,0 +1,245 @@
+// SPDX-License-Identifier: MIT
+// Copyright (c) Tarnell FBX contributors
+//
+// What the rules look at, take by take, and what they find.
+#include <algorithm>
+#include <map>
+#include <tuple>
+#include <unordered_set>
+
+#include <fbxsdk/extensions/FileFacts.h>
+
+#include "LintChecks.h"
+#include "SceneFacts.h"
+
+namespace tool {
+namespace {
+
+void addChannels(LintContext& context) {
+    const TakeLayers layers(context.stacks);
+    context.channelsByTake.resize(std::max<std::size_t>(context.stacks.size(), 1));
+    for (const FbxObject* object : context.objects) {
+        for (const FbxProperty& property : propertiesOf(*object)) {
+            for (TakeChannel& keyed : keyedChannels(property, layers))
+                context.channelsByTake[keyed.take].push_back({object, std::move(keyed.channel)});
+        }
+    }
+}
+
+LintContext contextOf(const std::string& file, const SceneFile& opened) {
+    LintContext context{file, opened, {}, {}, {}, {}, {}, {}, {}, {}, {}, {}, {}};
+    FbxScene& scene = opened.scene();
+    for (int i = 0; i < scene.GetSrcObjectCount<FbxAnimStack>(); ++i) {
+        context.stacks.push_back(scene.GetSrcObject<FbxAnimStack>(i));
+        context.takes.push_back(takeFacts(opened, context.stacks.back()));
+    }
+    context.nodes = nodesInOrder(scene);
+    context.objects = extensions::objectsOf(scene);
+    for (FbxObject* object : context.objects) {
+        if (auto* mesh = FbxCast<FbxMesh>(object))
+            context.meshes.push_back(mesh);
+    }
+    addChannels(context);
+    return context;
+}
+
+/// What a camera's values come from: the node, its attribute, its targets, and the nodes above all of these.
+std::unordered_set<const FbxObject*> cameraSources(const std::vector<TreeNode>& nodes) {
+    std::unordered_set<const FbxObject*> sources;
+    const auto addWithParents = [&sources](const FbxNode* node) {
+        for (; node && sources.insert(node).second; node = node->GetParent()) {
+        }
+    };
+    for (const TreeNode& each : nodes) {
+        if (!each.node->GetCamera())
+            continue;
+        sources.insert(each.node->GetCamera());
+        for (const FbxNode* node :
+             {static_cast<const FbxNode*>(each.node), static_cast<const FbxNode*>(each.node->GetTarget()),
+              static_cast<const FbxNode*>(each.node->GetTargetUp())})
+            addWithParents(node);
+    }
+    return sources;
+}
+
+/// Turns to takes, one after the other.
+class TakeVisitor {
+public:
+    explicit TakeVisitor(LintContext& context) : mContext(context) {
+        if (context.takes.size() > 1)
+            mCameraSources = cameraSources(context.nodes);
+    }
+
+    /// What the checks see is of this take from here on; what there is without one in a file that has none.
+    void enter(std::size_t index) {
+        mContext.take = mContext.takes.empty() ? takeFacts(mContext.file, nullptr) : mContext.takes[index];
+        mContext.channels = &mContext.channelsByTake[index];
+        mContext.unreadable.clear();
+        if (!mContext.stacks.empty())
+            mContext.scene().SetCurrentAnimationStack(mContext.stacks[index]);
+        if (index == 0) {
+            readCameras("");
+            mFirst = mContext.cameras;
+            mFirstIsUnreadable = !mContext.unreadable.empty();
+        } else if (!mayHaveOtherCameras(index)) {
+            mContext.cameras = mFirst;
+        } else if (isReachable(index)) {
+            readCameras(mContext.take.name);
+        } else { // nobody can ask for it by its name
+            mContext.cameras = std::make_shared<CameraList>();
+        }
+    }
+
+private:
+    /// Or unreadable ones: to know it the file is read once more.
+    [[nodiscard]] bool mayHaveOtherCameras(std::size_t index) const {
+        constexpr long long kManyFrames = 1 << 20;
+        return mFirstIsUnreadable || drivesCameras(0) || drivesCameras(index) ||
+               mContext.take.lastFrame - mContext.take.firstFrame > kManyFrames;
+    }
+
+    [[nodiscard]] bool drivesCameras(std::size_t index) const {
+        const std::vector<KeyedChannel>& channels = mContext.channelsByTake[index];
+        return std::any_of(channels.begin(), channels.end(),
+                           [this](const KeyedChannel& keyed) { return mCameraSources.contains(keyed.object); });
+    }
+
+    [[nodiscard]] bool isReachable(std::size_t index) const {
+        const std::string& name = mContext.take.name;
+        return !name.empty() &&
+               std::none_of(mContext.takes.begin(), mContext.takes.begin() + static_cast<std::ptrdiff_t>(index),
+                            [&name](const TakeFacts& take) { return take.name == name; });
+    }
+
+    void readCameras(const std::string& take) {
+        mContext.cameras = std::make_shared<CameraList>();
+        try {
+            mContext.cameras = std::make_shared<CameraList>(camerasOf(mContext.fileName, mContext.file, take));
+        } catch (const Unreadable& reason) {
+            mContext.unreadable = reason.what();
+        }
+    }
+
+    LintContext& mContext;
+    std::unordered_set<const FbxObject*> mCameraSources;
+    std::shared_ptr<const CameraList> mFirst;
+    bool mFirstIsUnreadable = false;
+};
+
+/// Leaves the scene with the take that it had.
+class TakeRestorer {
+public:
+    explicit TakeRestorer(FbxScene& scene) : mScene(scene), mTake(scene.GetCurrentAnimationStack()) {}
+    ~TakeRestorer() { mScene.SetCurrentAnimationStack(mTake); }
+    TakeRestorer(const TakeRestorer&) = delete;
+    TakeRestorer& operator=(const TakeRestorer&) = delete;
+
+private:
+    FbxScene& mScene;
+    FbxAnimStack* mTake;
+};
+
+/// Findings of takes: one that holds in several is one, with the names of these.
+class TakeFindings {
+public:
+    void add(std::vector<Finding> found, const TakeFacts& take) {
+        std::map<Key, int> seen; // of this take: what it has twice is two
+        for (Finding& finding : found) {
+            Key key{finding.rule, finding.object, finding.text, 0};
+            std::get<3>(key) = seen[key]++;
+            const auto [known, isNew] = mPlaces.try_emplace(std::move(key), mFindings.size());
+            if (isNew)
+                mFindings.push_back(std::move(finding));
+            if (take.exists)
+                mFindings[known->second].takes.push_back(take.name);
+        }
+    }
+    std::vector<Finding> take() { return std::move(mFindings); }
+
+private:
+    using Key = std::tuple<const LintRule*, std::string, std::string, int>;
+    std::map<Key, std::size_t> mPlaces;
+    std::vector<Finding> mFindings;
+};
+
+/// What one kind of checks of the rules finds.
+std::vector<Finding> findingsOf(const LintContext& context, const std::vector<std::string>& ids,
+                                LintCheck* LintRule::*check) {
+    LintReport report;
+    for (const LintRule& rule : lintRules()) {
+        if (!(rule.*check) || (!ids.empty() && std::find(ids.begin(), ids.end(), rule.id) == ids.end()))
+            continue;
+        report.rule = &rule;
+        (rule.*check)(context, report);
+    }
+    return std::move(report.findings);
+}
+
+} // namespace
+
+std::string nameOf(const FbxObject& object) {
+    const auto* attribute = FbxCast<FbxNodeAttribute>(&object);
+    return attribute && attribute->GetNodeCount() > 0 ? attribute->GetNode(0)->GetName() : object.GetName();
+}
+
+void forEachObjectRecord(const extensions::RecordFile& file,
+                         const std::function<void(const extensions::FileRecord&)>& work) {
+    for (extensions::FileRecord top = file.first(); top; top = top.nextSibling()) {
+        work(top); // before 6.0 objects stand at the top
+        for (extensions::FileRecord record = top.firstChild(); top.name() == "Objects" && record;
+             record = record.nextSibling())
+            work(record);
+    }
+}
+
+std::string plainName(std::string_view name) {
+    const std::size_t binary = name.find(std::string_view("\0\x01", 2)), colons = name.find("::");
+    return std::string(binary != name.npos   ? name.substr(0, binary)
+                       : colons != name.npos ? name.substr(colons + 2)
+                                             : name);
+}
+
+const extensions::RecordFile& LintContext::records() const {
+    FbxStatus status;
+    if (!openedRecords)
+        openedRecords = extensions::RecordFile::open(fileName.c_str(), status);
+    if (!openedRecords)
+        throw Unreadable(status.GetErrorString());
+    return *openedRecords;
+}
+
+FbxAMatrix LintContext::worldOf(FbxNode& node) const {
+    FbxTime time;
+    time.SetSecondDouble(static_cast<double>(take.firstFrame) / take.frameRate);
+    return node.EvaluateGlobalTransform(time);
+}
+
+std::string Finding::sentence(std::size_t takeCount) const {
+    if (takes.empty() || takes.size() == takeCount)
+        return text;
+    std::string names;
+    for (const std::string& name : takes)
+        names += (names.empty() ? "" : ", ") + inQuotes(name);
+    return text + (takes.size() == 1 ? " (in take " : " (in takes ") + names + ')';
+}
+
+LintFindings lintFindings(const std::string& file, const SceneFile& opened, const std::vector<std::string>& ids) {
+    const TakeRestorer restorer(opened.scene());
+    LintContext context = contextOf(file, opened);
+    TakeVisitor visitor(context);
+    visitor.enter(0);
+    LintFindings findings{findingsOf(context, ids, &LintRule::check), context.takes.size()};
+    TakeFindings inTakes;
+    for (std::size_t take = 0; take < context.channelsByTake.size(); ++take) {
+        if (take > 0)
+            visitor.enter(take);
+        inTakes.add(findingsOf(context, ids, &LintRule::checkInTake), context.take);
+    }
+    for (Finding& finding : inTakes.take())
+        findings.all.push_back(std::move(finding));
+    std::stable_sort(findings.all.begin(), findings.all.end(),
+                     [](const Finding& a, const Finding& b) { return a.rule < b.rule; });
+    return findings;
+}
+
+} // namespace tool
