@@ -221,6 +221,100 @@ class Meshes(Folder):
         self.assertEqual(frames[0]["frame"], 4)
 
 
+class Materials(Folder):
+    """materials_7400_ascii.fbx: the polygons of "strip" are glass, red, glass; glass has the texture bark."""
+    name = "materials_7400_ascii.fbx"
+
+    def changed(self, *replacements):
+        """The differences of the file to a copy in which each text, wherever it stands, is another."""
+        ours = os.path.join(SDK_DATA, self.name)
+        with open(ours, encoding="utf-8") as stream:
+            text = stream.read()
+        for old, new in replacements:
+            self.assertIn(old, text)
+            text = text.replace(old, new)
+        return self.diff(ours, self.file("b.fbx", text))
+
+    def test_differ_in_colours_and_factors(self):
+        found = self.only(self.changed(('"A",1,0.25,0.125', '"A",1,0.5,0.125')), "material", "red", "DiffuseColor")
+        self.assertEqual((found["a"], found["b"], found["amount"], found["frame"]),
+                         ("(1, 0.25, 0.125)", "(1, 0.5, 0.125)", 0.25, None))
+        found = self.only(self.changed(('"A",0.75', '"A",0.5')), "material", "glass", "TransparencyFactor")
+        self.assertEqual((found["a"], found["b"], found["amount"]), ("0.75", "0.5", 0.25))
+        self.assertEqual(self.changed(('"A",0.75', '"A",0.75001')), [])
+
+    def test_differ_in_what_is_stated_on_one_side(self):
+        shine = 'P: "DiffuseColor", "Color", "", "A",0,0.5,1\n\t\t\tP: "Sheen", "Number", "", "AU",0.5'
+        found = self.only(self.changed(('P: "DiffuseColor", "Color", "", "A",0,0.5,1', shine)), "material", "glass", "Sheen")
+        self.assertEqual((found["a"], found["b"]), (None, "0.5"))
+
+    def test_differ_in_their_class(self):
+        found = self.changed(('"lambert"', '"phong"'))
+        self.assertEqual([(each["kind"], each["object"], each["what"], each["a"], each["b"]) for each in found],
+                         [("material", "red", "class", "SurfaceLambert", "SurfacePhong")])
+
+    def test_are_renamed_added_and_removed(self):
+        found = self.only(self.changed(("Material::red", "Material::crimson")), "renamed", "red", "material")
+        self.assertEqual((found["a"], found["b"]), ("red", "crimson"))
+        new = '\tMaterial: 9, "Material::new", "" {\n\t\tVersion: 102\n\t\tShadingModel: "lambert"\n\t}\n\tTexture: 5'
+        found = self.only(self.changed(("\tTexture: 5", new)), "added", "new", "material")
+        self.assertEqual((found["a"], found["b"]), (None, "on no node"))
+        found = self.changed(("\tTexture: 5", new), ('C: "OO",4,2\n', 'C: "OO",4,2\n\tC: "OO",9,2\n'))
+        self.assertEqual([(each["kind"], each["object"], each["what"], each["a"], each["b"]) for each in found],
+                         [("added", "new", "material", None, 'on "strip"'),
+                          ("material", "strip", "materials", '"red", "glass"', '"red", "glass", "new"')])
+
+    def test_are_those_of_other_polygons(self):
+        found = self.only(self.changed(("a: 1,0,1", "a: 1,1,0")), "material", "strip", "2 of 3 polygons, the first polygon 1")
+        self.assertEqual((found["a"], found["b"]), ('"red"', '"glass"'))
+        # In another order, with the indices to match: the same to look at.
+        self.assertEqual(self.changed(("a: 1,0,1", "a: 0,1,0"), ('C: "OO",3,2\n\tC: "OO",4,2', 'C: "OO",4,2\n\tC: "OO",3,2')),
+                         [])
+
+    def test_differ_in_keys_and_at_the_worst_frame(self):
+        def keyed(values):
+            return scenes.scene(objects=scenes.record("Material", 30, "Material::paint", "", more=(
+                '\t\tVersion: 102\n\t\tShadingModel: "lambert"\n\t\tProperties70:  {\n'
+                '\t\t\tP: "DiffuseFactor", "Number", "", "A",1\n\t\t}\n')), connections='C: "OO",30,20\n',
+                                on=30, animated="DiffuseFactor", channel="d|DiffuseFactor", values=values)
+        found = self.diff(keyed([0.0, 0.25, 0.5, 0.75, 1.0]), keyed([0.0, 0.25, 1.0, 0.75, 1.0]))
+        self.assertEqual([(each["kind"], each["object"], each["what"], each["a"], each["b"], each["amount"], each["frame"])
+                          for each in found], [("curve", "paint", "DiffuseFactor", "0.5", "1", 0.5, 2),
+                                               ("material", "paint", "DiffuseFactor", "0.5", "1", 0.5, 2)])
+
+    def test_have_other_texture_files(self):
+        found = self.only(self.changed(("bark.png", "oak.png")), "texture", "glass", "DiffuseColor")
+        self.assertEqual((found["a"], found["b"]), ("bark.png", "oak.png"))
+        found = self.only(self.changed(('C: "OP",5,4, "DiffuseColor"', "")), "texture", "glass", "DiffuseColor")
+        self.assertEqual((found["a"], found["b"]), ("bark.png", None))
+        # The folder of another machine, under the same relative name.
+        self.assertEqual(self.changed(('FileName: "bark.png"', 'FileName: "D:\\textures\\bark.png"')), [])
+
+    def test_of_files_before_7_0_have_the_textures_of_polygons(self):
+        data = lambda version: os.path.join(SDK_DATA, f"materials_{version}_ascii.fbx")
+        with open(data("6100"), encoding="utf-8") as stream:
+            whole = stream.read()
+        # All polygons have the texture there, so that "red" has it, too.
+        found = [each for each in self.diff(data("6100"), data("7400")) if each["kind"] != "topology"]
+        self.assertEqual([(each["kind"], each["object"], each["what"], each["a"], each["b"]) for each in found],
+                         [("texture", "red", "DiffuseColor", "bark.png", None)])
+        self.assertIn("red\"  DiffuseColor: bark.png → nothing\n", run("diff", data("6100"), data("7400")).stdout)
+        element = whole[whole.index("LayerElementTexture: 0"):]
+        element = element[:element.index("TextureId: 0")]
+        one = element.replace('"AllSame"', '"ByPolygon"')
+        self.assertNotEqual(element, one)
+        other = self.file("b.fbx", whole.replace(element + "TextureId: 0", one + "TextureId: 0,-1,0"))
+        found = [each for each in self.diff(other, data("7400")) if each["kind"] != "topology"]
+        self.assertEqual(found, [])
+
+    def test_have_textures_that_lie_otherwise(self):
+        found = self.only(self.changed(('\t\tRelativeFilename: "bark.png"\n\t}\n\tVideo',
+                                        '\t\tRelativeFilename: "bark.png"\n\t\tProperties70:  {\n'
+                                        '\t\t\tP: "Scaling", "Vector", "", "A",2,2,1\n\t\t}\n\t}\n\tVideo')),
+                          "texture", "bark", "Scaling")
+        self.assertEqual((found["a"], found["b"], found["amount"]), ("(1, 1, 1)", "(2, 2, 1)", 1))
+
+
 class Page(html.parser.HTMLParser):
     def __init__(self, text):
         super().__init__()

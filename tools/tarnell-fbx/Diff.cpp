@@ -139,11 +139,9 @@ std::string sentenceOf(const Difference& difference) {
     std::string text = difference.what == diffKindName(difference.kind) ? "" : difference.what;
     if (difference.kind == DiffKind::added || difference.kind == DiffKind::removed)
         return text + ", " + difference.a + difference.b;
+    const auto orNothing = [](const std::string& said) { return said.empty() ? "nothing" : said; };
     if (!difference.a.empty() || !difference.b.empty())
-        text += (text.empty() ? "" : ": ") + (difference.a.empty() ? "" : difference.a + ' ') +
-                (difference.b.empty() ? "" : "→ " + difference.b);
-    while (!text.empty() && text.back() == ' ')
-        text.pop_back();
+        text += (text.empty() ? "" : ": ") + orNothing(difference.a) + " → " + orNothing(difference.b);
     if (difference.amount)
         text += ", " + significant(*difference.amount, 4) +
                 (difference.unit.empty() || difference.unit == "°" ? difference.unit : ' ' + difference.unit) +

@@ -80,22 +80,30 @@ std::vector<Key> keysOf(const Channel& channel) {
 
 using KeysByName = std::map<std::string, std::vector<Key>>;
 
-/// The properties of a node and of its attributes. One name may occur in both; then the second has a prefix.
+/// One name may belong to several objects; then later ones have a prefix.
+void addKeys(const FbxObject& object, FbxAnimStack* take, KeysByName& keys) {
+    for (const FbxProperty& property : propertiesOf(object)) {
+        for (const Channel& channel : channelsOf(property, take)) {
+            if (channel.curves.empty())
+                continue;
+            const std::string name = channel.fullName();
+            keys[keys.count(name) ? className(object) + '.' + name : name] = keysOf(channel);
+        }
+    }
+}
+
+/// Those of a node and of what stands on it.
 KeysByName keysByName(FbxNode& node, FbxAnimStack* take) {
     KeysByName keys;
-    const auto addAll = [&](const FbxObject& object) {
-        for (const FbxProperty& property : propertiesOf(object)) {
-            for (const Channel& channel : channelsOf(property, take)) {
-                if (channel.curves.empty())
-                    continue;
-                const std::string name = channel.fullName();
-                keys[keys.count(name) ? className(object) + '.' + name : name] = keysOf(channel);
-            }
-        }
-    };
-    addAll(node);
+    addKeys(node, take, keys);
     for (int i = 0; i < node.GetNodeAttributeCount(); ++i)
-        addAll(*node.GetNodeAttributeByIndex(i));
+        addKeys(*node.GetNodeAttributeByIndex(i), take, keys);
+    return keys;
+}
+
+KeysByName keysByName(FbxSurfaceMaterial& material, FbxAnimStack* take) {
+    KeysByName keys;
+    addKeys(material, take, keys);
     return keys;
 }
 
@@ -168,7 +176,8 @@ DiffMoments::DiffMoments(const TakeFacts& a, const TakeFacts& b)
 
 Comparison::Comparison(const DiffFile& fileA, const DiffFile& fileB, const DiffSettings& given)
     : a(fileA, given.take), b(fileB, given.take), settings(given),
-      pairs(matchNodes(fileA.opened.scene(), fileB.opened.scene())), moments(a.take, b.take) {}
+      pairs(matchNodes(fileA.opened.scene(), fileB.opened.scene())),
+      materials(matchMaterials(fileA.opened.scene(), fileB.opened.scene(), pairs)), moments(a.take, b.take) {}
 
 bool Comparison::differ(double one, double other) const {
     if (!std::isfinite(one) || !std::isfinite(other))
@@ -271,11 +280,11 @@ void compareCurves(Comparison& comparison) {
     const bool sameSpace =
         comparison.a.unit == comparison.b.unit && comparison.a.cameras.axes == comparison.b.cameras.axes;
     const std::vector<Key> none;
-    for (const auto& [nodeA, nodeB] : comparison.pairs) {
-        if (!nodeA || !nodeB)
-            continue;
-        const KeysByName a = keysByName(*nodeA, comparison.a.stack), b = keysByName(*nodeB, comparison.b.stack);
-        CurveComparison curves(comparison, nodeA->GetName());
+    const auto comparePair = [&](auto* objectA, auto* objectB) {
+        if (!objectA || !objectB)
+            return;
+        const KeysByName a = keysByName(*objectA, comparison.a.stack), b = keysByName(*objectB, comparison.b.stack);
+        CurveComparison curves(comparison, objectA->GetName());
         for (const auto& [name, keys] : a) {
             const auto found = b.find(name);
             if (sameSpace || name.rfind("Lcl ", 0) != 0)
@@ -285,20 +294,24 @@ void compareCurves(Comparison& comparison) {
             if (!a.count(name) && (sameSpace || name.rfind("Lcl ", 0) != 0))
                 curves.compare(name, none, keys);
         }
-    }
+    };
+    for (const auto& [nodeA, nodeB] : comparison.pairs)
+        comparePair(nodeA, nodeB);
+    for (const auto& [materialA, materialB] : comparison.materials)
+        comparePair(materialA, materialB);
 }
 
 const char* diffKindName(DiffKind kind) {
-    constexpr std::array<const char*, 15> kNames = {"rate",    "unit",    "axes",  "take",   "added",
-                                                    "removed", "renamed", "moved", "kind",   "transform",
-                                                    "optics",  "light",   "curve", "points", "topology"};
+    constexpr std::array<const char*, 17> kNames = {"rate",    "unit",   "axes",     "take",      "added",  "removed",
+                                                    "renamed", "moved",  "kind",     "transform", "optics", "light",
+                                                    "curve",   "points", "topology", "material",  "texture"};
     return kNames[static_cast<std::size_t>(kind)];
 }
 
 std::vector<Difference> differencesOf(const DiffFile& a, const DiffFile& b, const DiffSettings& settings) {
     Comparison comparison(a, b, settings);
-    for (const auto compare :
-         {compareFiles, compareTrees, compareTransforms, compareCameras, compareLights, compareCurves, compareMeshes})
+    for (const auto compare : {compareFiles, compareTrees, compareTransforms, compareCameras, compareLights,
+                               compareCurves, compareMeshes, compareMaterials})
         compare(comparison);
     return std::move(comparison.found);
 }

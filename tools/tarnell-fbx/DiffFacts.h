@@ -29,15 +29,17 @@ enum class DiffKind {
     light,
     curve,
     points,
-    topology
+    topology,
+    material,
+    texture
 };
 const char* diffKindName(DiffKind kind);
 
 struct Difference {
     DiffKind kind = DiffKind::rate;
-    std::string object;           ///< a node's name, as spelt in the first file that has it; empty for the file
-    std::string what;             ///< "position", "focalLength", "Lcl Translation.X"
-    std::string a, b;             ///< each file's value; empty where it has none
+    std::string object; ///< name of a node, material or texture, as the first file spells it; empty for the file
+    std::string what;   ///< "position", "focalLength", "Lcl Translation.X"
+    std::string a, b;   ///< what each file says; empty where it says nothing
     std::optional<double> amount; ///< the largest difference, where it is a number
     std::string unit;             ///< of the amount: "cm", "°"
     std::optional<double> frame;  ///< of the first file, at which it is largest

@@ -12,6 +12,7 @@
 #include "CameraFacts.h"
 #include "DiffFacts.h"
 #include "FaithfulRead.h"
+#include "MaterialMatching.h"
 #include "NodeMatching.h"
 #include "TnFbxLight.h"
 #include "TnFbxMesh.h"
@@ -67,6 +68,7 @@ public:
     const DiffSide a, b;
     const DiffSettings& settings;
     std::vector<NodePair> pairs;
+    std::vector<MaterialPair> materials;
     DiffMoments moments;
     std::vector<Difference> found;
 
@@ -86,5 +88,6 @@ void compareCameras(Comparison& comparison);
 void compareLights(Comparison& comparison);
 void compareCurves(Comparison& comparison);
 void compareMeshes(Comparison& comparison);
+void compareMaterials(Comparison& comparison); // and textures
 
 } // namespace tool
