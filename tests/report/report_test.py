@@ -13,8 +13,10 @@ import unittest
 
 sys.path.insert(0, os.path.join(os.path.dirname(os.path.abspath(__file__)), "..", "tool"))
 import scenes  # noqa: E402
-from support import NO_FRAMES, SDK_DATA, SHOT, TOOL, dump, named, run  # noqa: E402
+from schema import faults, load  # noqa: E402
+from support import NO_FRAMES, SDK_DATA, SHOT, TOOL, dump, float32, named, run  # noqa: E402
 
+LINT = os.path.join(SDK_DATA, "..", "lint")
 SHOT_ELEMENT = re.compile(r'<script type="application/json" class="shot">(.*?)</script>\n'
                           r'<script type="text/plain" class="arrays">([A-Za-z0-9+/=]*)</script>\n', re.S)
 
@@ -94,6 +96,52 @@ class Reports(unittest.TestCase):
         for node, item in zip(shot.nodes, expected["transforms"]):
             parent = shot.nodes[node["parent"]]["name"] if node["parent"] >= 0 else None
             self.assertEqual(parent, item["parent"])
+
+    def test_as_json_are_the_numbers_of_the_page(self):
+        files = [SHOT, os.path.join(SDK_DATA, "blend_shape_7400_ascii.fbx"), os.path.join(SDK_DATA, "lights_7400_ascii.fbx")]
+        documents = json.loads(run("report", "--json", *files).stdout)
+        schema = load("report")
+        for document, shot in zip(documents, self.report(*files), strict=True):
+            self.assertEqual(list(faults(document, schema, schema)), [])
+            self.assertEqual(list(document)[:2], ["format", "file"])
+            for key in ("file", "take", "info", "frames", "shapeFrames", "findings", "notes", "warnings"):
+                self.assertEqual(document[key], shot.data[key])
+            self.assertEqual(len(document["nodes"]), len(shot.nodes))
+            for node, other in zip(document["nodes"], shot.nodes):
+                self.assertEqual(list(node["channels"]), list(other["channels"]))
+                for name, value in node["channels"].items():
+                    values = value if isinstance(value, list) else [value] * document["frames"]["count"]
+                    self.assertEqual([float32(each) for each in values],
+                                     [float32(each) for each in shot.channel(other, name)])
+            for mesh, other in zip(document["meshes"], shot.data["meshes"], strict=True):
+                self.assertEqual(mesh["corners"], [each for corners in shot.triangles(other) for each in corners])
+                self.assertEqual(len(mesh["sets"]), len(other["sets"]))
+                for moment, flat in enumerate(mesh["sets"]):
+                    self.assertEqual([float32(each) for each in flat],
+                                     [each for point in shot.points(other, moment) for each in point])
+
+    def test_of_takes_beyond_all_frame_numbers_have_frames_that_grow(self):
+        file = os.path.join(LINT, "not-readable.fbx")  # a take of 2 400 000 000 frames, the last ones beyond an int
+        document = json.loads(run("report", "--json", file).stdout)
+        frames = document["frames"]
+        self.assertGreater(frames["step"], 1)
+        self.assertGreater(frames["count"], 1000)
+        last = frames["first"] + (frames["count"] - 1) * frames["step"]
+        self.assertTrue(1.9e9 < last < 2**31, last)
+        self.assertTrue(any("are left out" in note for note in document["notes"]), document["notes"])
+
+    def test_as_json_follow_the_rules_of_all_commands(self):
+        missing = os.path.join(self.folder, "missing.fbx")
+        result = run("report", "--jsonl", "--frames", "1001:1003", SHOT, missing)
+        lines = [json.loads(line) for line in result.stdout.splitlines()]
+        self.assertEqual((result.returncode, len(lines)), (1, 2))
+        self.assertEqual(lines[0]["frames"]["count"], 3)
+        self.assertEqual(list(lines[1]), ["format", "file", "error"])
+        self.assertEqual([list(faults(line, load("report"), load("report"))) for line in lines], [[], []])
+        for arguments in (("--json", "-o", self.page), ("--json", "--jsonl"), ()):
+            result = run("report", *arguments, SHOT)
+            self.assertEqual((result.returncode, result.stdout), (2, ""), arguments)
+        self.assertFalse(os.path.exists(self.page))
 
     def test_points_are_those_of_the_mesh_in_the_space_of_its_node(self):
         shot, = self.report(SHOT)

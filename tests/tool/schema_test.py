@@ -53,6 +53,11 @@ class Schemas(unittest.TestCase):
                 self.assertEqual([page["file"] for page in pages], FILES)
                 self.check(command, pages)
 
+    def test_of_reports(self):
+        if "made without npm" in run("report").stderr:
+            self.skipTest("this build has no reports")
+        self.check("report", documents("report", *FILES))
+
     def test_of_caches(self):
         self.check("cache", documents("cache", "--samples", "--verify", *FILES, *CACHES))
 

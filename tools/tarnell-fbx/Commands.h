@@ -122,9 +122,8 @@ int diff(const DiffOptions& options);
 int lint(const LintOptions& options);
 int records(const RecordsOptions& options);
 
-struct ReportOptions {
-    std::vector<std::string> files; ///< names and patterns
-    std::string output;             ///< "-": standard output
+struct ReportOptions : LookOptions {
+    std::string output; ///< of a page; "-": standard output
     std::string take;
     std::optional<std::pair<int, int>> frames; ///< only these
     bool force = false;                        ///< also over files that are no report

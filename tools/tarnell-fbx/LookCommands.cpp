@@ -229,12 +229,18 @@ void addReport(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] =
         addCommand<ReportOptions>(app, chosen, "report", "Write files as one page for a browser", report);
     command->add_option("FILE", options->files, "FBX files, or patterns of names")->required()->type_name("");
-    command->add_option("-o,--output", options->output, "The page to write; - for standard output")
-        ->required()
-        ->type_name("PAGE");
+    command->add_option("-o,--output", options->output, "The page to write; - for standard output")->type_name("PAGE");
+    addJson(*command, *options);
     addFrames(*command, options->frames, "Only the frames from A to B");
     addTake(*command, options->take);
     command->add_flag("--force", options->force, "Overwrite the page also where it is no report");
+    command->parse_complete_callback([chosenOptions = options] {
+        const bool isPage = chosenOptions->form == Form::text;
+        if (isPage && chosenOptions->output.empty())
+            throw CLI::RequiredError("--output (or --json)");
+        if (!isPage && !chosenOptions->output.empty())
+            throw CLI::ValidationError("--output", "JSON goes to standard output");
+    });
 }
 #else
 void addReport(CLI::App&, std::function<int()>&) {} // main prints the reason

@@ -13,6 +13,7 @@
 #include "FileList.h"
 #include "Progress.h"
 #include "ReportPage.h"
+#include "ShowFiles.h"
 
 namespace tool {
 namespace {
@@ -119,7 +120,11 @@ private:
             ReportArrays arrays;
             const Outcome outcome = attempt([&]() -> int {
                 JsonWriter json(document, /*pretty=*/false);
-                printReport(file, ReportScene(file, {mOptions.take, mOptions.frames}), arrays, json);
+                json.beginObject();
+                json.text("format", "tarnell-fbx report page 1");
+                json.text("file", spoken(file));
+                printReport(file, ReportScene(file, {mOptions.take, mOptions.frames}), &arrays, json);
+                json.endObject();
                 return kSuccess;
             });
             if (!outcome.reason.empty()) {
@@ -144,6 +149,14 @@ private:
 
 } // namespace
 
-int report(const ReportOptions& options) { return Report(options).run(); }
+int report(const ReportOptions& options) {
+    if (options.form == Form::text)
+        return Report(options).run();
+    return showFiles(options, "report", [&options](Page& page) -> int {
+        const ReportScene scene(page.file(), {options.take, options.frames});
+        page.json("report", [&](JsonWriter& json) { printReport(page.file(), scene, nullptr, json); });
+        return kSuccess;
+    });
+}
 
 } // namespace tool

@@ -22,7 +22,7 @@ constexpr int kMostFindings = 20;
 
 class DocumentPrinter {
 public:
-    DocumentPrinter(const ReportScene& scene, ReportArrays& arrays, JsonWriter& json)
+    DocumentPrinter(const ReportScene& scene, ReportArrays* arrays, JsonWriter& json)
         : mScene(scene), mArrays(arrays), mJson(json) {}
 
     void frames() {
@@ -177,12 +177,21 @@ private:
         for (std::size_t i = 0; i < samples.size(); ++i)
             samples[i] = channel.getAnimatedValue(static_cast<float>(frames.at(static_cast<int>(i))) /
                                                   static_cast<float>(mScene.sampleStep()));
+        if (!mArrays)
+            return reals(samples);
         mJson.beginObject();
-        mJson.integer("at", static_cast<long long>(mArrays.add(samples)));
+        mJson.integer("at", static_cast<long long>(mArrays->add(samples)));
         mJson.endObject();
     }
 
-    /// The data of `camera` besides the channels.
+    void reals(const std::vector<float>& numbers) {
+        mJson.beginArray();
+        for (const float number : numbers)
+            mJson.real(number);
+        mJson.endArray();
+    }
+
+    /// What `camera` says beside the channels.
     void print(const TnFbxCamera& camera, const FbxNode& node) {
         mJson.key("camera");
         mJson.beginObject();
@@ -238,6 +247,8 @@ private:
         mJson.integer("triangles", static_cast<long long>(shape.mesh.triangleCount));
         mJson.integer("drawnPoints", static_cast<long long>(shape.mesh.kept.size()));
         mJson.integer("drawnTriangles", static_cast<long long>(shape.mesh.triangles.size()));
+        if (!mArrays)
+            return printArrays(shape);
         const bool isSmall = shape.mesh.kept.size() <= 1U << 16U;
         mJson.integer("indexBytes", isSmall ? 2 : 4);
         mJson.integer("indices", static_cast<long long>(isSmall ? indices<std::uint16_t>(shape.mesh)
@@ -245,7 +256,29 @@ private:
         mJson.key("sets");
         mJson.beginArray();
         for (const std::vector<Point>& set : shape.sets)
-            mJson.integer(static_cast<long long>(mArrays.add(set)));
+            mJson.integer(static_cast<long long>(mArrays->add(set)));
+        mJson.endArray();
+    }
+
+    /// Three corners for each triangle, three numbers for each point.
+    void printArrays(const ReportShape& shape) {
+        mJson.key("corners");
+        mJson.beginArray();
+        for (const auto& triangle : shape.mesh.triangles) {
+            for (const auto corner : triangle)
+                mJson.integer(static_cast<long long>(corner));
+        }
+        mJson.endArray();
+        mJson.key("sets");
+        mJson.beginArray();
+        for (const std::vector<Point>& set : shape.sets) {
+            mJson.beginArray();
+            for (const Point& point : set) {
+                for (const float coordinate : point)
+                    mJson.real(coordinate);
+            }
+            mJson.endArray();
+        }
         mJson.endArray();
     }
 
@@ -256,21 +289,18 @@ private:
         for (const auto& triangle : mesh.triangles)
             narrow.push_back(
                 {static_cast<Index>(triangle[0]), static_cast<Index>(triangle[1]), static_cast<Index>(triangle[2])});
-        return mArrays.add(narrow);
+        return mArrays->add(narrow);
     }
 
     const ReportScene& mScene;
-    ReportArrays& mArrays;
+    ReportArrays* mArrays; ///< null: arrays stand in the document
     JsonWriter& mJson;
 };
 
 } // namespace
 
-void printReport(const std::string& file, const ReportScene& scene, ReportArrays& arrays, JsonWriter& json) {
+void printReport(const std::string& file, const ReportScene& scene, ReportArrays* arrays, JsonWriter& json) {
     DocumentPrinter printer(scene, arrays, json);
-    json.beginObject();
-    json.text("format", "tarnell-fbx report 1");
-    json.text("file", spoken(file));
     json.text("take", scene.take());
     json.key("info");
     json.beginObject();
@@ -282,7 +312,6 @@ void printReport(const std::string& file, const ReportScene& scene, ReportArrays
     printer.findings(lintFindings(file, scene.opened()));
     printer.sentences("notes", scene.notes());
     printer.sentences("warnings", scene.warnings());
-    json.endObject();
 }
 
 } // namespace tool

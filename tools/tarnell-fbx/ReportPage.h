@@ -13,8 +13,9 @@
 
 namespace tool {
 
-/// The document of one file; its long arrays are added to `arrays`, and the document has their offsets.
-void printReport(const std::string& file, const ReportScene& scene, ReportArrays& arrays, JsonWriter& json);
+/// The keys of one file's document. Its long arrays go to `arrays`, and the document says where; without `arrays` they
+/// stand in the document itself.
+void printReport(const std::string& file, const ReportScene& scene, ReportArrays* arrays, JsonWriter& json);
 
 /// Writes a page: begin, then for each file its document and its arrays, then end.
 class ReportPage {

@@ -69,8 +69,8 @@ std::string counted(std::size_t count, const char* one, const char* many) {
 
 /// The smallest power of two from a number on: dividing a frame, and most rates, by one is exact, and so the time of
 /// a frame is the same at each of these rates.
-int powerOfTwoFrom(int number) {
-    return static_cast<int>(std::bit_ceil(static_cast<unsigned>(std::clamp(number, 1, 1 << 30))));
+int powerOfTwoFrom(long long number) {
+    return static_cast<int>(std::bit_ceil(static_cast<unsigned>(std::clamp(number, 1LL, 1LL << 30))));
 }
 bool isExact(double rate) { return static_cast<double>(static_cast<float>(rate)) == rate; }
 
@@ -122,41 +122,48 @@ void ReportScene::chooseFrames(const ReportWishes& wishes) {
     mFrames.first = static_cast<int>(std::clamp(take.firstFrame, -kMost, kMost));
     mFrames.count = static_cast<int>(std::clamp(take.lastFrame, -kMost, kMost)) - mFrames.first + 1;
     const double nodes = std::max(1, mOpened.scene().GetNodeCount());
-    mSampleStep = powerOfTwoFrom(static_cast<int>(std::min(std::ceil(mFrames.count * nodes / kMostEvaluations), 1e9)));
+    mSampleStep =
+        powerOfTwoFrom(static_cast<long long>(std::min(std::ceil(mFrames.count * nodes / kMostEvaluations), 1e9)));
 }
 
 /// Selects frames among those that were read: the requested ones, limited to what a page can hold.
 void ReportScene::boundFrames(const ReportWishes& wishes) {
     std::size_t moving = 0;
-    int first = mFrames.first, last = first + mFrames.count - 1;
+    long long first = mFrames.first, last = first + mFrames.count - 1;
     for (const ReportNode& node : mNodes) {
         eachChannel(node, [&](const TnFbxChannel& channel) {
             if (!channel.getAnimated())
                 return;
             ++moving;
-            first = channel.getTime().getStartFrame() * mSampleStep; // the same for all
-            last = channel.getTime().getEndFrame() * mSampleStep;
+            first = static_cast<long long>(channel.getTime().getStartFrame()) * mSampleStep; // the same for all
+            last = static_cast<long long>(channel.getTime().getEndFrame()) * mSampleStep;
         });
     }
-    const int all = last - first + 1;
+    const long long all = last - first + 1;
     if (wishes.frames) {
         if (wishes.frames->first > last || wishes.frames->second < first)
             throw Unreadable("it has no frames from " + std::to_string(wishes.frames->first) + " to " +
                              std::to_string(wishes.frames->second) + "; its frames: " + std::to_string(first) + " to " +
                              std::to_string(last));
-        first = std::max(first, wishes.frames->first);
-        last = std::min(last, wishes.frames->second);
+        first = std::max<long long>(first, wishes.frames->first);
+        last = std::min<long long>(last, wishes.frames->second);
         // between two samples there is none
         first += (mSampleStep - (first % mSampleStep + mSampleStep) % mSampleStep) % mSampleStep;
         first = std::min(first, last);
     }
-    const long long samples = (static_cast<long long>(last) - first) / mSampleStep + 1;
+    // Takes may claim what no frame number can name; sampled ones stay on their samples.
+    const long long furthest = 2'000'000'000 / mSampleStep * mSampleStep;
+    if (first < -furthest || last > furthest)
+        note("Frames beyond " + std::to_string(furthest) + " are left out.");
+    first = std::clamp(first, -furthest, furthest);
+    last = std::clamp(last, first, furthest);
+    const long long samples = (last - first) / mSampleStep + 1;
     const auto frames = static_cast<std::size_t>(samples);
     const std::size_t numbers = std::max(frames * moving * kMostFrames, frames * kMostSamples);
     const auto stride = static_cast<int>((numbers - 1) / (kMostSamples * kMostFrames) + 1);
-    mFrames.first = first;
+    mFrames.first = static_cast<int>(first);
     mFrames.step = mSampleStep * stride;
-    mFrames.count = (last - first) / mFrames.step + 1;
+    mFrames.count = static_cast<int>((last - first) / mFrames.step + 1);
     if (mFrames.step > 1)
         note("Of its " + std::to_string(all) + " frames the report shows every " + std::to_string(mFrames.step) +
              "th: all of them would be too many for a page (--frames picks a part).");
@@ -173,7 +180,9 @@ ReportScene::Objects<Object> ReportScene::read(Reader<Object> reader) {
 }
 
 void ReportScene::readOneMoment(int frame) {
-    readEvery(isExact(mFrames.rate) ? powerOfTwoFrom(mFrames.count * mFrames.step) : mSampleStep, frame);
+    readEvery(isExact(mFrames.rate) ? powerOfTwoFrom(static_cast<long long>(mFrames.count) * mFrames.step)
+                                    : mSampleStep,
+              frame);
 }
 
 void ReportScene::readEvery(int step, int frame) {
