@@ -234,7 +234,27 @@ class Convert(unittest.TestCase):
         self.assertIn("moving meshes: 1\n", self.convert(source=SKINNED).stderr)
         self.assertNotIn("moving meshes", self.convert("--force", "--frames", "1001:1011", source=SKINNED).stderr)
         self.assertEqual(self.convert("--force", source=MOVING).stderr, "")
-        self.assertIn("gate fits of cameras: 1\n", self.convert("--force").stderr)
+        said = self.convert("--force").stderr
+        self.assertIn("gate fits of cameras: 1\n", said)
+        self.assertIn("resolutions of cameras: 1\n", said)
+        again = run("convert", self.out, os.path.join(self.folder.name, "again.fbx"))
+        self.assertEqual((again.returncode, again.stderr), (0, ""))  # they are gone: nothing more to lose
+
+    def test_what_cameras_lose_is_said(self):
+        clean = os.path.join(ROOT, "tests", "data", "lint", "clean.fbx")
+        with open(clean, encoding="utf-8") as stream:
+            text = stream.read()
+        self.assertEqual(self.convert("--force", source=clean).stderr.count("of cameras"), 1)  # a resolution
+        source = os.path.join(self.folder.name, "camera.fbx")
+        for name, value, what in (("PreScale", 1.5, "pre-scales of the images of cameras: 1"),
+                                  ("FilmTranslateX", 0.5, "pre-scales of the images of cameras: 1"),
+                                  ("UseDepthOfField", 1, "depths of field of cameras: 1"), ("PreScale", 1, None)):
+            with open(source, "w", encoding="utf-8") as stream:
+                line = '\t\t\tP: "%s", "double", "Number", "",%s\n' % (name, value)
+                stream.write(text.replace('\t\t\tP: "FilmWidth"', line + '\t\t\tP: "FilmWidth"'))
+            said = self.convert("--force", source=source).stderr
+            self.assertEqual(what is not None, said.count("of cameras") == 2, said)
+            self.assertIn(what or "", said)
 
     def test_strict_makes_losses_the_exit_status(self):
         self.assertEqual(run("convert", "--strict", MOVING, self.out).returncode, 0)

@@ -8,6 +8,7 @@
 #include <set>
 #include <string_view>
 
+#include <fbxsdk/extensions/FileFacts.h>
 #include <fbxsdk/extensions/RecordFile.h>
 
 #include "PropertyValues.h"
@@ -111,7 +112,7 @@ struct NodeCounts {
     LightExtras extras;
     int parents = 0, hidden = 0, ownProperties = 0, shared = 0;
     int surfaces = 0, others = 0;
-    int zooms = 0, gateFits = 0, lights = 0;
+    int zooms = 0, gateFits = 0, resolutions = 0, imageShifts = 0, depthsOfField = 0, lights = 0;
     int furtherCaches = 0;
     int furtherUVs = 0, furtherNormals = 0, furtherColours = 0, tangents = 0, smoothing = 0, creases = 0;
 
@@ -163,6 +164,18 @@ private:
     }
 
     void add(const FbxCamera& camera) {
+        const bool hasResolution =
+            extensions::isStated(camera.AspectWidth) || extensions::isStated(camera.AspectHeight);
+        resolutions += hasResolution ? 1 : 0;
+        const auto isOther = [&camera](const char* name, double usual) {
+            const FbxProperty property = camera.FindProperty(name);
+            return property.IsValid() && property.Get<FbxDouble>() != usual;
+        };
+        const bool shifts = isOther("OpticalCenterX", 0.0) || isOther("OpticalCenterY", 0.0) ||
+                            isOther("FilmTranslateX", 0.0) || isOther("FilmTranslateY", 0.0) ||
+                            isOther("FilmRollValue", 0.0) || isOther("PreScale", 1.0);
+        imageShifts += shifts ? 1 : 0;
+        depthsOfField += isOther("UseDepthOfField", 0.0) ? 1 : 0;
         gateFits += camera.GateFit.Get() != FbxCamera::eFitNone ? 1 : 0;
         zooms += camera.ProjectionType.Get() == FbxCamera::eOrthogonal ? 1 : 0;
     }
@@ -216,6 +229,9 @@ void Losses::addScene(FbxScene& scene) {
     add(nodes.furtherCaches, "not written: caches of normals and further ones of meshes");
     add(nodes.zooms, "not written: zooms of orthographic cameras");
     add(nodes.gateFits, "not written: gate fits of cameras");
+    add(nodes.resolutions, "not written: resolutions of cameras");
+    add(nodes.imageShifts, "not written: optical centres, shifts, rolls and pre-scales of the images of cameras");
+    add(nodes.depthsOfField, "not written: depths of field of cameras");
     add(nodes.lights, "written as point lights: area and volume lights");
     nodes.extras.report(*this);
     add(nodes.surfaces, "written as meshes: surfaces");
