@@ -350,6 +350,15 @@ class Forms(Folder):
         self.assertEqual(json.loads(line), json.loads(run("diff", "--json", a, b).stdout))
         self.assertIn('"cam"  focalLength: 35 → 50, 15 mm apart at frame 0', run("diff", a, b).stdout)
 
+    def test_of_text_gather_the_curves_of_which_files_say_the_same(self):
+        still = self.file("b.fbx", scenes.scene(keyed=False))
+        turned = scenes.record("AnimationCurveNode", 40, "AnimCurveNode::R", "", {"d|Z": 0.0})
+        a = self.file("a.fbx", scenes.scene(
+            frames=(0, 4), values=[0.0, 0.0], objects=turned + scenes.curve(41, (0, 4), [0.0, 0.0], 24),
+            connections='C: "OO",40,11\nC: "OP",40,1, "Lcl Rotation"\nC: "OP",41,40, "d|Z"\n'))
+        self.assertEqual(len([each for each in self.diff(a, still) if each["kind"] == "curve"]), 2)
+        self.assertIn('"cam"  Lcl Rotation.Z, Lcl Translation.X: 2 keys → not keyed\n', run("diff", a, still).stdout)
+
     def test_of_text_do_not_say_a_kind_twice(self):
         a, b = self.file("a.fbx", scenes.scene()), self.file("b.fbx", scenes.scene(unit=100.0))
         self.assertIn("  unit       centimetre → metre\n", run("diff", a, b).stdout)

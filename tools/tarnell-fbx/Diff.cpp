@@ -26,13 +26,30 @@ std::string countsText(const std::vector<Difference>& found) {
                          : std::to_string(found.size()) + (found.size() == 1 ? " difference" : " differences");
 }
 
+/// Curves of one object of which the files say the same make one line.
+std::vector<Difference> withoutRepetition(const std::vector<Difference>& found) {
+    std::vector<Difference> lines;
+    for (const Difference& each : found) {
+        Difference* last = lines.empty() ? nullptr : &lines.back();
+        const bool isSame = last && each.kind == DiffKind::curve && last->kind == each.kind &&
+                            last->object == each.object && last->a == each.a && last->b == each.b && !each.amount &&
+                            !last->amount;
+        if (isSame) {
+            last->what += ", " + each.what;
+        } else {
+            lines.push_back(each);
+        }
+    }
+    return lines;
+}
+
 void printText(const DiffPage& page, std::ostream& out) {
     const Terminal terminal = standardTerminal();
     out << terminal.paint(Ink::heading, terminalText(page.a)) << " → "
         << terminal.paint(Ink::heading, terminalText(page.b)) << "  " << countsText(page.found) << " beyond "
         << numberText(page.tolerance) << '\n';
     const char* last = "";
-    for (const Difference& each : page.found) {
+    for (const Difference& each : withoutRepetition(page.found)) {
         constexpr std::size_t kColumn = 10;
         const std::string kind = diffKindName(each.kind);
         const bool isSame = kind == last;
