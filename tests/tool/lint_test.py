@@ -143,6 +143,22 @@ class Findings(unittest.TestCase):
         self.assertEqual(takes(mesh, film, mesh), ["shot", "b1"])
         self.assertEqual(takes(film, mesh, film), ["b0"])
 
+    def test_of_scales_see_their_keys(self):
+        def found(rule, **keys):
+            nulls = scenes.null(30, "big") + scenes.null(31, "free", {"InheritType": 2})
+            text = scenes.scene(objects=nulls, connections='C: "OO",30,0\nC: "OO",31,30\n', on=30,
+                                animated="Lcl Scaling", **keys)
+            page = json.loads(run("lint", "--json", "--rules", rule, "-", input=text).stdout)
+            return [(each["object"], each["text"], each["takes"]) for each in page["findings"]]
+        grows = {"frames": (0, 4), "values": [1.0, 3.0]}
+        self.assertEqual(found("inherited-scale", **grows),
+                         [("free", 'it leaves out the scale of its parent "big", which is keyed', ["shot"])])
+        self.assertEqual(found("inherited-scale", frames=(0, 4), values=[1.0, 1.0]), [])
+        self.assertEqual(found("inherited-scale", frames=(0, 4), values=[3.0, 3.0]),
+                         [("free", 'it leaves out the scale of its parent "big", (3, 1, 1)', ["shot"])])
+        self.assertEqual(found("zero-scale", frames=(0, 4), values=[0.0, 1.0]),
+                         [("big", "its scale is (0, 1, 1)", ["shot"])])
+
     def test_that_depend_on_no_take_name_none(self):
         page, _ = lint(os.path.join(DATA, "squeezed-film.fbx"))
         self.assertEqual({tuple(each["takes"]) for each in page["findings"]}, {()})

@@ -45,7 +45,9 @@ struct LintContext {
 
     [[nodiscard]] FbxScene& scene() const { return file.scene(); }
     [[nodiscard]] double unit() const { return scene().GetGlobalSettings().GetSystemUnit().GetScaleFactor(); }
-    /// The node in the file's world, at the first frame of the take.
+    /// The first frame of the take.
+    [[nodiscard]] FbxTime firstMoment() const;
+    /// The node in the file's world, at that frame.
     [[nodiscard]] FbxAMatrix worldOf(FbxNode& node) const;
     /// Opened when first asked for. Throws Unreadable.
     [[nodiscard]] const extensions::RecordFile& records() const;

@@ -208,11 +208,13 @@ const extensions::RecordFile& LintContext::records() const {
     return *openedRecords;
 }
 
-FbxAMatrix LintContext::worldOf(FbxNode& node) const {
+FbxTime LintContext::firstMoment() const {
     FbxTime time;
     time.SetSecondDouble(static_cast<double>(take.firstFrame) / take.frameRate);
-    return node.EvaluateGlobalTransform(time);
+    return time;
 }
+
+FbxAMatrix LintContext::worldOf(FbxNode& node) const { return node.EvaluateGlobalTransform(firstMoment()); }
 
 std::string Finding::sentence(std::size_t takeCount) const {
     if (takes.empty() || takes.size() == takeCount)

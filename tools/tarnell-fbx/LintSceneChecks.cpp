@@ -36,6 +36,19 @@ double determinant(const FbxAMatrix& matrix) {
 
 bool isUneven(const FbxDouble3& scale) { return scale[0] != scale[1] || scale[1] != scale[2]; }
 
+/// Whether the take has keys of different values.
+bool changes(const FbxProperty& property, FbxAnimStack* take) {
+    for (const Channel& channel : channelsOf(property, take)) {
+        for (const LayerCurve& each : channel.curves) {
+            for (int i = 1; i < each.curve->KeyGetCount(); ++i) {
+                if (each.curve->KeyGetValue(i) != each.curve->KeyGetValue(0))
+                    return true;
+            }
+        }
+    }
+    return false;
+}
+
 bool isOnlyScaled(const FbxAMatrix& matrix) {
     for (int row = 0; row < 3; ++row) {
         for (int column = 0; column < 3; ++column) {
@@ -184,7 +197,7 @@ void meshAtOrigin(const LintContext& context, LintReport& report) {
 
 void zeroScale(const LintContext& context, LintReport& report) {
     for (const TreeNode& each : context.nodes) {
-        const FbxDouble3 scale = each.node->LclScaling.Get();
+        const FbxDouble3 scale = each.node->LclScaling.EvaluateValue(context.firstMoment());
         if (scale[0] == 0.0 || scale[1] == 0.0 || scale[2] == 0.0)
             report.add(each.node->GetName(), "its scale is " + vectorText({scale[0], scale[1], scale[2]}, 6));
     }
@@ -215,18 +228,19 @@ void shearedNode(const LintContext& context, LintReport& report) {
 
 void inheritedScale(const LintContext& context, LintReport& report) {
     for (const TreeNode& each : context.nodes) {
-        const FbxNode* parent = each.node->GetParent();
+        FbxNode* parent = each.node->GetParent();
         FbxTransform::EInheritType type = FbxTransform::eInheritRSrs;
         each.node->GetTransformationInheritType(type);
         if (!parent || !parent->GetParent() || type == FbxTransform::eInheritRSrs)
             continue;
-        const FbxDouble3 scale = parent->LclScaling.Get();
-        if (type == FbxTransform::eInheritRrs ? scale != FbxDouble3(1.0, 1.0, 1.0) : isUneven(scale))
-            report.add(
-                each.node->GetName(),
-                std::string(type == FbxTransform::eInheritRrs ? "it leaves out" : "it takes along its own axes") +
-                    " the scale of its parent " + inQuotes(parent->GetName()) + ", " +
-                    vectorText({scale[0], scale[1], scale[2]}, 4));
+        const FbxDouble3 scale = parent->LclScaling.EvaluateValue(context.firstMoment());
+        const bool isKeyed = changes(parent->LclScaling, context.scene().GetCurrentAnimationStack());
+        const bool leavesOut = type == FbxTransform::eInheritRrs;
+        if (isKeyed || (leavesOut ? scale != FbxDouble3(1.0, 1.0, 1.0) : isUneven(scale)))
+            report.add(each.node->GetName(),
+                       std::string(leavesOut ? "it leaves out" : "it takes along its own axes") +
+                           " the scale of its parent " + inQuotes(parent->GetName()) + ", " +
+                           (isKeyed ? "which is keyed" : vectorText({scale[0], scale[1], scale[2]}, 4)));
     }
 }
 
