@@ -11,7 +11,7 @@ import sys
 import tempfile
 import unittest
 
-from support import SDK_DATA, SHOT, edited, float32, run
+from support import ROOT, SDK_DATA, SHOT, edited, float32, run
 
 
 def fixture(name):
@@ -114,6 +114,15 @@ class Targets(unittest.TestCase):
             self.assertEqual(self.names(SHOT, "shotCam." + spelling), whole)
         for spelling in ("Lcl Translation.Y", "translation.y"):
             self.assertEqual(self.names(SHOT, "shotCam." + spelling), whole[1:2])
+
+    def test_what_has_no_name_is_called_by_its_node(self):
+        with open(os.path.join(ROOT, "tests", "data", "lint", "curve-that-stops-three-js.fbx"), encoding="utf-8") as stream:
+            text = stream.read().replace("NodeAttribute::cam", "NodeAttribute::")
+        for form, words in (((), "\ncam.FilmOffsetX  [Camera]\n"), (("--plot",), "\ncam.FilmOffsetX\n"),
+                            (("--csv",), "frame,seconds,cam.FilmOffsetX\n")):
+            self.assertIn(words, run("curve", *form, "-", "cam", input=text).stdout)
+        self.assertEqual(json.loads(run("curve", "--json", "-", "cam", input=text).stdout)["channels"][0]["object"], "")
+        self.assertIn('\n"cam"  Camera\n', run("props", "-", "cam", input=text).stdout)
 
     def test_names_may_hold_dots(self):
         with tempfile.TemporaryDirectory() as folder:

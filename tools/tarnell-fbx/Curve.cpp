@@ -30,7 +30,7 @@ struct ChosenChannel {
     const FbxObject* object;
     Channel channel;
 
-    [[nodiscard]] std::string fullName() const { return std::string(object->GetName()) + '.' + channel.fullName(); }
+    [[nodiscard]] std::string fullName() const { return spokenName(*object) + '.' + channel.fullName(); }
 };
 
 struct FrameRange {

@@ -69,7 +69,7 @@ std::string described(const FbxProperty& property) {
 
 void printObject(const FbxObject& object, const PropsOptions& options, FbxAnimStack* take, std::ostream& out,
                  const Terminal& terminal) {
-    out << terminal.paint(Ink::name, inQuotes(object.GetName())) << "  " << className(object) << '\n';
+    out << terminal.paint(Ink::name, inQuotes(spokenName(object))) << "  " << className(object) << '\n';
     Table table({{"Property"},
                  {"Type", Table::Align::left, Ink::faint},
                  {"Flags"},

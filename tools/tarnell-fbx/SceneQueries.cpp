@@ -88,6 +88,12 @@ std::vector<FbxObject*> objectsNamed(FbxScene& scene, const std::string& name) {
     return found;
 }
 
+std::string spokenName(const FbxObject& object) {
+    const std::string name = object.GetName();
+    const auto* attribute = FbxCast<FbxNodeAttribute>(&object);
+    return name.empty() && attribute && attribute->GetNodeCount() > 0 ? attribute->GetNode(0)->GetName() : name;
+}
+
 std::string className(const FbxObject& object) {
     const std::string name = object.GetClassId().GetName();
     return name.rfind("Fbx", 0) == 0 ? name.substr(3) : name;

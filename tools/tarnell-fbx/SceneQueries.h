@@ -40,7 +40,10 @@ std::vector<FbxProperty> propertiesOf(const FbxObject& object);
 /// The scene's objects of that name: nodes first, then the others.
 std::vector<FbxObject*> objectsNamed(FbxScene& scene, const std::string& name);
 
-/// The class without the common prefix of all classes: "Node", "Camera", "AnimLayer".
+/// What people call the object: what has no name of its own is called by its node.
+std::string spokenName(const FbxObject& object);
+
+/// The class without the prefix that all classes have: "Node", "Camera", "AnimLayer".
 std::string className(const FbxObject& object);
 
 /// The message that there is no object of the name, with similar names.
