@@ -4,6 +4,7 @@
 # What curve says of keys explains what it says of samples: between two keys a curve is worked out here from the slopes
 # and weights that were printed, as a Bézier curve.
 import csv
+import importlib.util
 import io
 import json
 import os
@@ -12,6 +13,12 @@ import tempfile
 import unittest
 
 from support import ROOT, SDK_DATA, SHOT, edited, float32, run
+
+
+spec = importlib.util.spec_from_file_location("make_lint_files",
+                                              os.path.join(ROOT, "tests", "data", "lint", "make_lint_files.py"))
+scenes = importlib.util.module_from_spec(spec)
+spec.loader.exec_module(scenes)
 
 
 def fixture(name):
@@ -108,6 +115,17 @@ class Targets(unittest.TestCase):
         self.assertIn(("Node", "Lcl Translation", "X"), names)
         self.assertEqual(len(names), len(set(names)))
 
+    def test_a_node_answers_for_its_blend_shapes_and_materials(self):
+        file = fixture("blend_shape_7400_ascii.fbx")
+        tree = json.loads(run("tree", "--json", file).stdout)["nodes"]
+        shaped = [each for each in tree if any("blend shape" in text for text in each["deformers"])]
+        self.assertEqual([each["animated"] for each in shaped], [True] * len(shaped))
+        names = [name for each in shaped for name in self.names(file, each["name"])]
+        self.assertIn(("BlendShapeChannel", "DeformPercent", ""), names)
+        painted = scenes.scene(objects=scenes.record("Material", 30, "Material::paint", "", {"DiffuseFactor": 1.0}),
+                               connections='C: "OO",30,20\n', on=30, animated="DiffuseFactor", channel="d|DiffuseFactor")
+        self.assertIn("\npaint.DiffuseFactor  [Surface", run("curve", "-", "tri", input=painted).stdout)
+
     def test_properties_and_components_may_be_spelt_simply(self):
         whole = [("Node", "Lcl Translation", axis) for axis in "XYZ"]
         for spelling in ("Lcl Translation", "lcl translation", "Translation", "translation"):
@@ -163,6 +181,25 @@ class Words(unittest.TestCase):
         for row, value in zip(text.splitlines()[-10:], page["samples"]["values"]):
             self.assertLessEqual(len(row.split()[-1]), 9)
             self.assertEqual(float32(float(row.split()[-1])), value)
+
+    def test_of_frames_leave_out_what_ticks_round(self):
+        file = os.path.join(ROOT, "tests", "data", "blender", "layers_7400_binary.fbx")  # at 23.976
+        page = curves(file, "house.Lcl Translation.X")["channels"][0]["curves"][0]
+        self.assertNotEqual(page["keys"][0]["frame"], 1001)  # the number of the file
+        rows = run("curve", file, "house.Lcl Translation.X").stdout.splitlines()[-5:]
+        self.assertEqual([row.split()[0] for row in rows], ["1001", "1002", "1003", "1004", "1005"])
+
+    def test_of_samples_tell_channels_of_one_name_apart(self):
+        def paint(number, name):
+            return scenes.record("Material", number, "Material::" + name, "", {"DiffuseFactor": 1.0})
+        keys = scenes.record("AnimationCurveNode", 41, "AnimCurveNode::D", "", {"d|DiffuseFactor": 0.0})
+        text = scenes.scene(
+            objects=paint(30, "paint") + paint(40, "rust") + keys + scenes.curve(42, (0, 4), [0.0, 1.0], 24),
+            connections='C: "OO",30,20\nC: "OO",40,20\nC: "OO",41,11\nC: "OP",41,40, "DiffuseFactor"\n'
+                        'C: "OP",42,41, "d|DiffuseFactor"\n',
+            on=30, animated="DiffuseFactor", channel="d|DiffuseFactor")
+        page = run("curve", "-", "tri", "--frames", "0:1", input=text).stdout
+        self.assertIn("  Frame   Seconds  paint.DiffuseFactor  rust.DiffuseFactor\n", page)
 
     def test_of_a_plot_say_what_stands_still_in_a_line(self):
         text = run("curve", SHOT, "shotCam.FocusDistance", "--plot").stdout.splitlines()

@@ -38,12 +38,18 @@ struct FrameRange {
     [[nodiscard]] long long count() const { return last - first + 1; }
 };
 
-/// The object and its parts: a node includes its attributes.
+/// The object and what it consists of: attributes, blend shapes and materials of a node answer for it.
 std::vector<FbxObject*> withAttributes(FbxObject& object) {
     std::vector<FbxObject*> objects{&object};
     auto* node = FbxCast<FbxNode>(&object);
-    for (int i = 0; node && i < node->GetNodeAttributeCount(); ++i)
+    if (!node)
+        return objects;
+    for (int i = 0; i < node->GetNodeAttributeCount(); ++i)
         objects.push_back(node->GetNodeAttributeByIndex(i));
+    for (FbxBlendShapeChannel* channel : blendChannelsOf(*node))
+        objects.push_back(channel);
+    for (int i = 0; i < node->GetMaterialCount(); ++i)
+        objects.push_back(node->GetMaterial(i));
     return objects;
 }
 
@@ -181,6 +187,9 @@ FrameRange defaultRange(const SceneFile& file, FbxAnimStack* take, const std::ve
 
 std::string shortNumber(double number) { return numberText(std::round(number * 1e6) / 1e6); }
 
+/// Files round the ticks of odd rates, to some ten-thousandths of a frame.
+std::string frameText(double frame) { return numberText(std::round(frame * 1e3) / 1e3); }
+
 std::string extrapolationText(const Extrapolation& extrapolation) {
     if (!extrapolation.repeats)
         return extrapolation.type;
@@ -232,7 +241,7 @@ void printCurve(const Curves& curves, const LayerCurve& each, std::ostream& out,
                  {"Right slope", Table::Align::right},
                  {"Remarks"}});
     for (const KeyFacts& key : keys) {
-        table.addRow({shortNumber(curves.frameOf(key.time)), shortNumber(key.time.GetSecondDouble()),
+        table.addRow({frameText(curves.frameOf(key.time)), shortNumber(key.time.GetSecondDouble()),
                       exactText(key.value), key.interpolation, key.tangent,
                       key.leftSlope ? floatText(*key.leftSlope) : "", key.rightSlope ? floatText(*key.rightSlope) : "",
                       key.remarks()});
@@ -243,8 +252,14 @@ void printCurve(const Curves& curves, const LayerCurve& each, std::ostream& out,
 void printSamples(const Curves& curves, const Terminal& terminal, std::ostream& out) {
     out << "\nSamples, all layers together\n";
     std::vector<Table::Column> columns{{"Frame", Table::Align::right}, {"Seconds", Table::Align::right}};
+    std::map<std::string, int> titles;
     for (const ChosenChannel& chosen : curves.channels)
-        columns.push_back({terminalText(chosen.channel.fullName()), Table::Align::right, Ink::number});
+        ++titles[chosen.channel.fullName()];
+    for (const ChosenChannel& chosen : curves.channels) {
+        const std::string title = chosen.channel.fullName();
+        columns.push_back(
+            {terminalText(titles[title] == 1 ? title : chosen.fullName()), Table::Align::right, Ink::number});
+    }
     Table table(columns);
     for (long long frame = curves.range->first; frame <= curves.range->last; ++frame) {
         const FbxTime time = curves.timeOf(static_cast<double>(frame));

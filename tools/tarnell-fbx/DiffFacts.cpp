@@ -81,15 +81,22 @@ std::vector<Key> keysOf(const Channel& channel) {
 using KeysByName = std::map<std::string, std::vector<Key>>;
 
 /// One name may belong to several objects; then later ones have a prefix.
-void addKeys(const FbxObject& object, FbxAnimStack* take, KeysByName& keys) {
+void addKeys(const FbxObject& object, FbxAnimStack* take, KeysByName& keys, const std::string& prefix = {}) {
     for (const FbxProperty& property : propertiesOf(object)) {
         for (const Channel& channel : channelsOf(property, take)) {
             if (channel.curves.empty())
                 continue;
-            const std::string name = channel.fullName();
+            const std::string name = prefix + channel.fullName();
             keys[keys.count(name) ? className(object) + '.' + name : name] = keysOf(channel);
         }
     }
+}
+
+/// Some files have the name of the blend shape before that of its channel.
+std::string shapeName(FbxBlendShapeChannel& channel) {
+    const FbxBlendShape* shapes = channel.GetBlendShapeDeformer();
+    const std::string name = channel.GetName(), prefix = std::string(shapes ? shapes->GetName() : "") + '.';
+    return prefix.size() > 1 && name.starts_with(prefix) ? name.substr(prefix.size()) : name;
 }
 
 /// Those of a node and of what stands on it.
@@ -98,6 +105,8 @@ KeysByName keysByName(FbxNode& node, FbxAnimStack* take) {
     addKeys(node, take, keys);
     for (int i = 0; i < node.GetNodeAttributeCount(); ++i)
         addKeys(*node.GetNodeAttributeByIndex(i), take, keys);
+    for (FbxBlendShapeChannel* channel : blendChannelsOf(node))
+        addKeys(*channel, take, keys, shapeName(*channel) + '.');
     return keys;
 }
 

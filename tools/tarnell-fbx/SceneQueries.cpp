@@ -53,6 +53,17 @@ bool isAnimated(const FbxProperty& property) {
     return false;
 }
 
+std::vector<FbxBlendShapeChannel*> blendChannelsOf(FbxNode& node) {
+    std::vector<FbxBlendShapeChannel*> channels;
+    auto* geometry = FbxCast<FbxGeometry>(node.GetNodeAttribute());
+    for (int d = 0; geometry && d < geometry->GetDeformerCount(FbxDeformer::eBlendShape); ++d) {
+        auto* shapes = FbxCast<FbxBlendShape>(geometry->GetDeformer(d, FbxDeformer::eBlendShape));
+        for (int c = 0; shapes && c < shapes->GetBlendShapeChannelCount(); ++c)
+            channels.push_back(shapes->GetBlendShapeChannel(c));
+    }
+    return channels;
+}
+
 bool isProducer(const FbxNode& node) {
     const auto* camera = FbxCast<FbxCamera>(node.GetNodeAttribute());
     return camera && node.GetScene()->GlobalCameraSettings().IsProducerCamera(camera);

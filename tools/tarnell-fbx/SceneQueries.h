@@ -28,6 +28,9 @@ std::vector<TreeNode> nodesInOrder(FbxScene& scene);
 /// Whether any curve of any take drives the property.
 bool isAnimated(const FbxProperty& property);
 
+/// The channels of the blend shapes that deform what the node shows.
+std::vector<FbxBlendShapeChannel*> blendChannelsOf(FbxNode& node);
+
 /// Whether the node is a camera of the application's own views.
 bool isProducer(const FbxNode& node);
 

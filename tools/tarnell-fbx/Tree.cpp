@@ -19,7 +19,7 @@ namespace {
 
 /// The data of a node besides its name and kind.
 struct NodeFacts {
-    bool animated = false; ///< itself, or one of its attributes
+    bool animated = false; ///< itself, one of its attributes or its blend shapes
     bool hidden = false;
     const char* rotationOrder = "XYZ"; ///< the effective one
     std::string target;
@@ -64,6 +64,8 @@ NodeFacts factsOf(FbxNode& node) {
         facts.target = target->GetName();
     for (int i = 0; i < node.GetNodeAttributeCount(); ++i)
         facts.animated = facts.animated || anyAnimated(*node.GetNodeAttributeByIndex(i));
+    for (const FbxBlendShapeChannel* channel : blendChannelsOf(node))
+        facts.animated = facts.animated || anyAnimated(*channel);
     if (const FbxNodeAttribute* attribute = node.GetNodeAttribute()) {
         facts.instance = attribute->GetNode(0) != &node;
         const std::string name = attribute->GetName();
