@@ -158,22 +158,22 @@ class Targets(unittest.TestCase):
 
 
 class Words(unittest.TestCase):
-    def test_of_extrapolation_tell_without_end_from_a_number_of_times(self):
+    def test_of_extrapolation_tell_endless_from_counted_repetition(self):
         file = fixture("extrapolation_7400_ascii.fbx")
         sides = {each["component"]: each["curves"][0] for each in curves(file, "endless")["channels"]}
         for component, kind in (("X", "repetition"), ("Y", "mirror")):
             for side in ("before", "after"):
                 self.assertEqual(sides[component][side], {"type": kind, "count": None})
         page = run("curve", file, "endless").stdout
-        self.assertIn("before repetition without end, after repetition without end", page)
+        self.assertIn("before repetition (endless), after repetition (endless)", page)
         self.assertIn("before slope, after slope", page)
-        self.assertIn("before constant, after repetition once", run("curve", file, "other").stdout)
+        self.assertIn("before constant, after repetition (once)", run("curve", file, "other").stdout)
 
-    def test_of_extrapolation_tell_zero_times_from_without_end(self):
+    def test_of_extrapolation_tell_zero_times_from_endless(self):
         with tempfile.TemporaryDirectory() as folder:
             file = edited("extrapolation_7400_ascii.fbx", os.path.join(folder, "zero.fbx"),
                           ("Type: R\n\t\t\tRepetition: 1\n", "Type: R\n\t\t\tRepetition: 0\n"))
-            self.assertIn("after repetition 0 times", run("curve", file, "other").stdout)
+            self.assertIn("after repetition (0 times)", run("curve", file, "other").stdout)
 
     def test_of_numbers_have_the_digits_that_floats_hold(self):
         page = curves(SHOT, "shotCam.FocalLength", "--frames", "1001:1010")["channels"][0]

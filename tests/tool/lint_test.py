@@ -110,7 +110,7 @@ class Findings(unittest.TestCase):
                                  ("cache-rate", "tri", "24 frames per second, and the file has 25"),
                                  ("duplicate-names", "twin", "2 nodes"), ("constraints", None, '"Aim"'),
                                  ("take-without-keys", "still", "nothing is keyed in the take"),
-                                 ("unparented-nodes", "stray", "nothing holds it, and others hang below it")):
+                                 ("unparented-nodes", "stray", "it has no parent, but descendants")):
             page, _ = lint(os.path.join(DATA, name + ".fbx"), "--rules", name)
             self.assertEqual([each["object"] for each in page["findings"]], [who], name)
             self.assertIn(words, page["findings"][0]["text"])

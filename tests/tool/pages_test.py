@@ -4,8 +4,8 @@
 # Whole pages of the commands that inspect files, as they are printed without colours. Each file of
 # tests/data/tool/pages is a transcript: a command behind "$ ", then what it prints on standard output, then behind "! "
 # what on standard error, then its exit status where that is not 0. Commands may be joined by " | ". With --update the
-# transcripts are written anew; read the difference before you keep it. What stands in those of ten files follows from
-# itself: angles from lens and film, the picture from the gate fit, and each command says what the others say.
+# transcripts are rewritten; read the difference before you keep it. Those of ten files are also checked for consistency:
+# angles with lens and film, pictures with the gate fit, and the values of a camera between commands.
 import csv
 import glob
 import io
@@ -19,7 +19,7 @@ import unittest
 
 from support import ROOT, run
 
-# What is written has the time of writing in it.
+# Written files contain the time.
 ENVIRONMENT = {"PATH": os.environ["PATH"], "SOURCE_DATE_EPOCH": "1000000000"}
 PAGES = os.path.join(ROOT, "tests", "data", "tool", "pages")
 
@@ -124,7 +124,7 @@ class Files(unittest.TestCase):
                 compared += 1
         self.assertGreaterEqual(compared, 60)
 
-    def test_commands_say_the_same_of_cameras(self):
+    def test_commands_agree_on_cameras(self):
         compared = 0
         for name, camera, row in self.rows():
             dumped = json.loads(self.page(name, "dump"))["cameras"]
@@ -140,7 +140,7 @@ class Files(unittest.TestCase):
         self.assertGreaterEqual(compared, 30)
 
     @unittest.skipUnless(transcripts("report"), "this build has no reports")
-    def test_reports_say_where_cameras_are(self):
+    def test_reports_agree_on_positions_of_cameras(self):
         compared = 0
         for name, camera, row in self.rows():
             document = json.loads(self.page(name, "report"))

@@ -219,7 +219,7 @@ void printContent(const CacheFacts& facts, const CacheOptions& options, std::ost
         out << "  Verified: all samples are there, and every number is finite\n";
 }
 
-/// A cache that several deformers use, each a channel of it, is shown once.
+/// A cache that several deformers use is printed once.
 void printEntries(const std::vector<CacheEntry>& entries, const CacheOptions& options, Page& page, std::ostream& out) {
     std::set<std::string> shown;
     for (const CacheEntry& entry : entries) {

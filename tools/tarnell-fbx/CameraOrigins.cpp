@@ -44,7 +44,7 @@ FbxAMatrix turnOf(const Vector3& angles) {
     return turn;
 }
 
-/// For people, as many digits as floats have; `props` has all of them.
+/// With the digits of a float; `props` prints all of them.
 std::string shortText(double number) { return significant(number + 0.0, 7); }
 
 std::string shortText(const FbxProperty& property) {

@@ -123,7 +123,7 @@ int lint(const LintOptions& options);
 int records(const RecordsOptions& options);
 
 struct ReportOptions : LookOptions {
-    std::string output; ///< of a page; "-": standard output
+    std::string output; ///< the page; "-": standard output
     std::string take;
     std::optional<std::pair<int, int>> frames; ///< only these
     bool force = false;                        ///< also over files that are no report

@@ -38,7 +38,7 @@ struct FrameRange {
     [[nodiscard]] long long count() const { return last - first + 1; }
 };
 
-/// The object and what it consists of: attributes, blend shapes and materials of a node answer for it.
+/// The object and its parts: a node includes its attributes, blend shape channels and materials.
 std::vector<FbxObject*> withAttributes(FbxObject& object) {
     std::vector<FbxObject*> objects{&object};
     auto* node = FbxCast<FbxNode>(&object);
@@ -187,16 +187,16 @@ FrameRange defaultRange(const SceneFile& file, FbxAnimStack* take, const std::ve
 
 std::string shortNumber(double number) { return numberText(std::round(number * 1e6) / 1e6); }
 
-/// Files round the ticks of odd rates, to some ten-thousandths of a frame.
+/// Files round the ticks of rates like 23.976, which leaves fractions of some 1e-5 frames.
 std::string frameText(double frame) { return numberText(std::round(frame * 1e3) / 1e3); }
 
 std::string extrapolationText(const Extrapolation& extrapolation) {
     if (!extrapolation.repeats)
         return extrapolation.type;
-    if (!extrapolation.count)
-        return std::string(extrapolation.type) + " without end";
-    return std::string(extrapolation.type) + ' ' +
-           (*extrapolation.count == 1 ? "once" : std::to_string(*extrapolation.count) + " times");
+    const std::string times = !extrapolation.count        ? "endless"
+                              : *extrapolation.count == 1 ? "once"
+                                                          : std::to_string(*extrapolation.count) + " times";
+    return std::string(extrapolation.type) + " (" + times + ')';
 }
 
 const char* blendName(const FbxAnimLayer& layer) {

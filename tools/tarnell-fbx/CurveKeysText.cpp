@@ -80,8 +80,8 @@ KeyFacts factsOf(const FbxAnimCurve& curve, int key) {
     return facts;
 }
 
-/// Whether the curve stands still on one side of its keys though it moves between them. The API has one number for
-/// keys that come again without end and for those that a file has come again zero times.
+/// Whether the curve is constant before or after its keys, and not between them. In the API the count 0 means endless
+/// repetition, and also is what a file with 0 repetitions has.
 bool standsStillBeside(FbxAnimCurve& curve, bool before) {
     constexpr long long kProbes = 32;
     const FbxTime first = curve.KeyGetTime(0), last = curve.KeyGetTime(curve.KeyGetCount() - 1);

@@ -31,8 +31,8 @@ struct KeyFacts {
 
 struct Extrapolation {
     const char* type = "constant"; ///< constant, repetition, mirror, slope, relative
-    bool repeats = false;          ///< whether the keys come again
-    std::optional<long> count;     ///< how often; none: without end, or where nothing is repeated
+    bool repeats = false;          ///< whether the keys repeat
+    std::optional<long> count;     ///< of repetitions; none: endless, or where nothing is repeated
 };
 
 std::vector<KeyFacts> keyFacts(FbxAnimCurve& curve);

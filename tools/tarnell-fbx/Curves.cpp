@@ -27,7 +27,7 @@ double Channel::staticValue() const {
 
 namespace {
 
-/// Before anything drives them.
+/// Without curves.
 std::vector<Channel> stillChannels(const FbxProperty& property) {
     constexpr const char* kNames[] = {"X", "Y", "Z", "W"};
     std::vector<Channel> channels;
@@ -46,7 +46,7 @@ void addCurves(const FbxAnimCurveNode& node, FbxAnimLayer* layer, std::vector<Ch
     }
 }
 
-/// What a property has on a layer of a take.
+/// The curve node of a property on a layer of a take.
 struct PlacedNode {
     TakeLayers::Place place;
     FbxAnimLayer* layer;

@@ -33,7 +33,7 @@ struct Channel {
 /// A property's channels, also those that are not driven. Without a take none is driven.
 std::vector<Channel> channelsOf(const FbxProperty& property, FbxAnimStack* take);
 
-/// Which takes layers belong to, and where they stand in these.
+/// The takes that layers belong to, and their index in these.
 class TakeLayers {
 public:
     explicit TakeLayers(const std::vector<FbxAnimStack*>& takes);
@@ -54,7 +54,7 @@ struct TakeChannel {
     Channel channel;
 };
 
-/// A property's channels that have keys, take by take: one pass, however many takes there are.
+/// The channels of a property that have keys, take by take, in one pass over its curve nodes.
 std::vector<TakeChannel> keyedChannels(const FbxProperty& property, const TakeLayers& layers);
 
 /// How many keys all curves of the property have in the take.

@@ -26,7 +26,7 @@ std::string countsText(const std::vector<Difference>& found) {
                          : std::to_string(found.size()) + (found.size() == 1 ? " difference" : " differences");
 }
 
-/// Curves of one object of which the files say the same make one line.
+/// Merges curves of one object with the same difference into one line.
 std::vector<Difference> withoutRepetition(const std::vector<Difference>& found) {
     std::vector<Difference> lines;
     for (const Difference& each : found) {
@@ -152,7 +152,7 @@ void print(const DiffPage& page, Form form) {
 } // namespace
 
 std::string sentenceOf(const Difference& difference) {
-    // What is named for its kind needs no name beside it.
+    // "unit: centimetre → metre", not "unit unit: …".
     std::string text = difference.what == diffKindName(difference.kind) ? "" : difference.what;
     if (difference.kind == DiffKind::added || difference.kind == DiffKind::removed)
         return text + ", " + difference.a + difference.b;

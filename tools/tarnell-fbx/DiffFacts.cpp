@@ -80,7 +80,7 @@ std::vector<Key> keysOf(const Channel& channel) {
 
 using KeysByName = std::map<std::string, std::vector<Key>>;
 
-/// One name may belong to several objects; then later ones have a prefix.
+/// Adds the keys of an object's properties. A name that occurs before gets a prefix.
 void addKeys(const FbxObject& object, FbxAnimStack* take, KeysByName& keys, const std::string& prefix = {}) {
     for (const FbxProperty& property : propertiesOf(object)) {
         for (const Channel& channel : channelsOf(property, take)) {
@@ -92,14 +92,14 @@ void addKeys(const FbxObject& object, FbxAnimStack* take, KeysByName& keys, cons
     }
 }
 
-/// Some files have the name of the blend shape before that of its channel.
+/// Without the name of the blend shape, which some versions write before that of the channel.
 std::string shapeName(FbxBlendShapeChannel& channel) {
     const FbxBlendShape* shapes = channel.GetBlendShapeDeformer();
     const std::string name = channel.GetName(), prefix = std::string(shapes ? shapes->GetName() : "") + '.';
     return prefix.size() > 1 && name.starts_with(prefix) ? name.substr(prefix.size()) : name;
 }
 
-/// Those of a node and of what stands on it.
+/// Those of a node, its attributes and its blend shape channels.
 KeysByName keysByName(FbxNode& node, FbxAnimStack* take) {
     KeysByName keys;
     addKeys(node, take, keys);

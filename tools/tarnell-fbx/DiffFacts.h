@@ -37,9 +37,10 @@ const char* diffKindName(DiffKind kind);
 
 struct Difference {
     DiffKind kind = DiffKind::rate;
-    std::string object; ///< name of a node, material or texture, as the first file spells it; empty for the file
-    std::string what;   ///< "position", "focalLength", "Lcl Translation.X"
-    std::string a, b;   ///< what each file says; empty where it says nothing
+    std::string
+        object; ///< name of a node, material or texture, as spelt in the first file that has it; empty for the file
+    std::string what;             ///< "position", "focalLength", "Lcl Translation.X"
+    std::string a, b;             ///< each file's value; empty where it has none
     std::optional<double> amount; ///< the largest difference, where it is a number
     std::string unit;             ///< of the amount: "cm", "°"
     std::optional<double> frame;  ///< of the first file, at which it is largest

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Materials: which nodes and polygons have which, what they say, and the files of their textures.
+// Materials: their assignments to nodes and polygons, their properties, and their textures.
 #include <algorithm>
 #include <cmath>
 #include <map>
@@ -40,7 +40,7 @@ std::string textOf(const FbxProperty& property) {
     return numbers.size() == 1 ? text : '(' + text + ')';
 }
 
-/// What two objects, which belong together, say differently.
+/// Compares the properties of two objects that match.
 class PropertyComparison {
 public:
     PropertyComparison(Comparison& comparison, DiffKind kind, std::string object)
@@ -67,7 +67,7 @@ public:
             mComparison.found.push_back({mKind, mObject, nameOf(a), textOf(a), textOf(b), most, "", {}, 0});
     }
 
-    /// What only one of the two states.
+    /// A property that only one of the two has.
     void alone(const FbxProperty& property, bool isA) {
         const std::string text = extensions::isStated(property) ? textOf(property) : "";
         if (!text.empty())
@@ -104,7 +104,7 @@ private:
 
 // ---- Polygons ----
 
-/// The materials of a mesh's polygons, as a node shows it.
+/// The materials of the polygons of a node's mesh.
 class PolygonMaterials {
 public:
     explicit PolygonMaterials(FbxNode& node) : mNode(node), mMesh(node.GetMesh()) {
@@ -128,7 +128,7 @@ private:
 
 // ---- Textures ----
 
-/// The file by its relative name, which goes with the scene; a texture without a file by its own name.
+/// The relative file name if there is one, else the absolute one; the name of the texture where it has no file.
 std::string fileOf(const FbxTexture& texture) {
     const auto* file = FbxCast<FbxFileTexture>(&texture);
     std::string name = file ? file->GetRelativeFileName() : "";
@@ -138,7 +138,7 @@ std::string fileOf(const FbxTexture& texture) {
     return name.empty() ? className(texture) + ' ' + inQuotes(texture.GetName()) : name;
 }
 
-/// Which textures colour what: those of materials' properties, and those that files before 7.0 give to polygons.
+/// The textures of properties: those connected to them, and those that files before 7.0 assign to polygons.
 class TextureTable {
 public:
     using Textures = std::vector<FbxTexture*>;
@@ -169,7 +169,7 @@ public:
     }
 
 private:
-    /// Layers one by one.
+    /// Adds the textures of a layered texture one by one.
     static void addFlat(FbxTexture& texture, Textures& textures) {
         if (!texture.Is<FbxLayeredTexture>())
             return addOnce(&texture, textures);
@@ -282,7 +282,7 @@ PropertiesByName propertiesByName(const FbxObject& object) {
     return properties;
 }
 
-/// Those that both have; where they are of one class, also what one of them states alone.
+/// Compares the properties that both have and, if both are of the same class, those that only one states.
 void compareProperties(Comparison& comparison, const FbxSurfaceMaterial& a, const FbxSurfaceMaterial& b) {
     const bool sameClass = a.GetClassId() == b.GetClassId();
     if (!sameClass)
@@ -357,7 +357,7 @@ private:
         return found == mCounterpart.end() ? nullptr : found->second;
     }
 
-    /// In any order: polygons tell which is where.
+    /// In any order: the polygons refer to them by index.
     [[nodiscard]] bool haveTheSame(const FbxNode& a, const FbxNode& b) const {
         std::vector<const FbxSurfaceMaterial*> one, other;
         for (int i = 0; i < a.GetMaterialCount(); ++i)

@@ -149,7 +149,7 @@ struct TreeLine {
     std::string indent;
 };
 
-/// More nodes than this are counted, not listed: a page is one screen.
+/// More nodes than this are counted, not listed: the page fits one screen.
 constexpr int kMaximumTreeLines = 40;
 
 void printTree(FbxNode& root, std::ostream& out, const Terminal& terminal) {

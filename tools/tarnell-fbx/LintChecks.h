@@ -37,8 +37,8 @@ struct LintContext {
     std::vector<FbxMesh*> meshes;
     std::vector<std::vector<KeyedChannel>> channelsByTake; ///< as `takes`
 
-    // Of the take that is looked at; of the first one where the file is.
-    TakeFacts take; ///< what there is without one where the file has none
+    // Of the current take; of the first one for checks of the file.
+    TakeFacts take; ///< a default where the file has none
     const std::vector<KeyedChannel>* channels = nullptr;
     std::shared_ptr<const CameraList> cameras;
     std::string unreadable; ///< why the library cannot read the take faithfully
@@ -79,10 +79,11 @@ LintCheck polygonsOutOfRange, smallPolygons, meshWithoutPolygons, meshWithoutNor
 /// The name of the object for display: a camera or mesh by its node.
 std::string nameOf(const FbxObject& object);
 
-/// The records of the file's objects, as they stand in it: what the scene has no place for, or has mended already.
+/// The records of the file's objects, unchanged: including what the scene cannot hold, or has repaired.
 void forEachObjectRecord(const extensions::RecordFile& file,
                          const std::function<void(const extensions::FileRecord&)>& work);
-/// An object's name without its class: "Geometry::tri" in a text, with the two the other way round in a binary file.
+/// An object's name without its class: "Geometry::tri" in an ASCII file, with the two in reverse order in a binary
+/// file.
 std::string plainName(std::string_view name);
 
 /// "1 key", "3 keys".

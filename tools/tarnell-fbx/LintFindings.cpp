@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// What the rules look at, take by take, and what they find.
+// The traversal for the checks of the rules, take by take, and their findings.
 #include <algorithm>
 #include <map>
 #include <tuple>
@@ -43,7 +43,7 @@ LintContext contextOf(const std::string& file, const SceneFile& opened) {
     return context;
 }
 
-/// What a camera's values come from: the node, its attribute, its targets, and the nodes above all of these.
+/// The objects that cameras depend on: their nodes, attributes and targets, with all ancestors.
 std::unordered_set<const FbxObject*> cameraSources(const std::vector<TreeNode>& nodes) {
     std::unordered_set<const FbxObject*> sources;
     const auto addWithParents = [&sources](const FbxNode* node) {
@@ -62,7 +62,7 @@ std::unordered_set<const FbxObject*> cameraSources(const std::vector<TreeNode>& 
     return sources;
 }
 
-/// Turns to takes, one after the other.
+/// Makes one take after the other the current one.
 class TakeVisitor {
 public:
     explicit TakeVisitor(LintContext& context) : mContext(context) {
@@ -70,7 +70,7 @@ public:
             mCameraSources = cameraSources(context.nodes);
     }
 
-    /// What the checks see is of this take from here on; what there is without one in a file that has none.
+    /// From here on the checks see this take; a default in a file without takes.
     void enter(std::size_t index) {
         mContext.take = mContext.takes.empty() ? takeFacts(mContext.file, nullptr) : mContext.takes[index];
         mContext.channels = &mContext.channelsByTake[index];
@@ -85,13 +85,14 @@ public:
             mContext.cameras = mFirst;
         } else if (isReachable(index)) {
             readCameras(mContext.take.name);
-        } else { // nobody can ask for it by its name
+        } else { // it cannot be selected by its name
             mContext.cameras = std::make_shared<CameraList>();
         }
     }
 
 private:
-    /// Or unreadable ones: to know it the file is read once more.
+    /// Whether the cameras of the take may differ from those of the first one, or be unreadable: the file is read
+    /// again.
     [[nodiscard]] bool mayHaveOtherCameras(std::size_t index) const {
         constexpr long long kManyFrames = 1 << 20;
         return mFirstIsUnreadable || drivesCameras(0) || drivesCameras(index) ||
@@ -126,7 +127,7 @@ private:
     bool mFirstIsUnreadable = false;
 };
 
-/// Leaves the scene with the take that it had.
+/// Restores the current take of the scene.
 class TakeRestorer {
 public:
     explicit TakeRestorer(FbxScene& scene) : mScene(scene), mTake(scene.GetCurrentAnimationStack()) {}
@@ -139,11 +140,11 @@ private:
     FbxAnimStack* mTake;
 };
 
-/// Findings of takes: one that holds in several is one, with the names of these.
+/// Merges the findings of takes: one that holds in several becomes one with the names of these.
 class TakeFindings {
 public:
     void add(std::vector<Finding> found, const TakeFacts& take) {
-        std::map<Key, int> seen; // of this take: what it has twice is two
+        std::map<Key, int> seen; // equal findings of one take stay separate
         for (Finding& finding : found) {
             Key key{finding.rule, finding.object, finding.text, 0};
             std::get<3>(key) = seen[key]++;
@@ -162,7 +163,7 @@ private:
     std::vector<Finding> mFindings;
 };
 
-/// What one kind of checks of the rules finds.
+/// The findings of the checks of the file, or of those of the current take.
 std::vector<Finding> findingsOf(const LintContext& context, const std::vector<std::string>& ids,
                                 LintCheck* LintRule::*check) {
     LintReport report;
@@ -185,7 +186,7 @@ std::string nameOf(const FbxObject& object) {
 void forEachObjectRecord(const extensions::RecordFile& file,
                          const std::function<void(const extensions::FileRecord&)>& work) {
     for (extensions::FileRecord top = file.first(); top; top = top.nextSibling()) {
-        work(top); // before 6.0 objects stand at the top
+        work(top); // before 6.0 objects are at the top level
         for (extensions::FileRecord record = top.firstChild(); top.name() == "Objects" && record;
              record = record.nextSibling())
             work(record);

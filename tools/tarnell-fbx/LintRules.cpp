@@ -97,7 +97,7 @@ const std::vector<LintRule> kRules = {
     {"no-resolution", kNote,
      "Without a resolution the shape of the picture, and so the gate fit, is the reader's guess.",
      "Set the resolution of the render and save again.", noResolution, nullptr},
-    // Where things are.
+    // Placement.
     {"far-from-origin", kWarning,
      "Floats this far out are so coarse that things jitter and seams open; hosts keep places as floats.",
      "Move the scene to the origin, and keep the offset apart.", nullptr, farFromOrigin},
@@ -121,8 +121,8 @@ const std::vector<LintRule> kRules = {
     {"odd-names", kWarning, "Control characters and broken UTF-8 in names get lost or stop other readers.",
      "Rename the node.", oddNames, nullptr},
     {"unparented-nodes", kWarning,
-     "The file connects the node neither to the root nor to another node: assimp and Blender leave it out "
-     "with all that hangs below it, others, this library among them, place it at the root.",
+     "The file connects the node neither to the root nor to another node: assimp and Blender drop it with all its "
+     "descendants, others, this library among them, place it below the root.",
      "Parent it and save again, or use tarnell-fbx convert, which connects it to the root.", unparentedNodes, nullptr},
     {"constraints", kWarning, "Constraints are not evaluated: what they drive reads as it was keyed or left.",
      "Bake the constrained nodes before saving.", constraints, nullptr},

@@ -24,8 +24,8 @@ struct LintRule {
     Severity severity;
     const char* reason;     ///< why it matters
     const char* remedy;     ///< what to do
-    LintCheck* check;       ///< of the file; null where all depends on the take
-    LintCheck* checkInTake; ///< of each take, or once where there is none; null where nothing depends on it
+    LintCheck* check;       ///< of the file; null if the rule depends on the take only
+    LintCheck* checkInTake; ///< of each take, once in files without takes; null if the rule does not depend on it
 };
 
 /// All rules, in the order in which findings are reported.
@@ -35,9 +35,9 @@ struct Finding {
     const LintRule* rule = nullptr;
     std::string object; ///< the name of the object it is about; empty for the file as a whole
     std::string text;
-    std::vector<std::string> takes; ///< that it holds in; empty where it depends on none
+    std::vector<std::string> takes; ///< in which it holds; empty if it does not depend on the take
 
-    /// The text, and the takes it holds in where these are not all `takeCount` of the file.
+    /// The text, followed by the takes in which it holds unless these are all `takeCount` of the file.
     [[nodiscard]] std::string sentence(std::size_t takeCount) const;
 };
 

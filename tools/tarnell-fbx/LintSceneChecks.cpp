@@ -81,7 +81,7 @@ bool isFinite(const FbxProperty& property) {
     return true;
 }
 
-/// Applications keep their own views outside of the tree.
+/// Cameras of views are outside of the tree on purpose.
 bool isOfViews(const FbxNode& node) {
     const FbxNodeAttribute* attribute = node.GetNodeAttribute();
     return isProducer(node) || (attribute && attribute->GetAttributeType() == FbxNodeAttribute::eCameraSwitcher);
@@ -89,7 +89,7 @@ bool isOfViews(const FbxNode& node) {
 
 bool isText(const extensions::RecordValue& value) { return value.type == extensions::RecordValue::eText; }
 
-/// How connections name an object: by its number, or before 7.0 by its name.
+/// How connections refer to an object: by its number, before 7.0 by its name.
 std::string spellingOf(const extensions::RecordValue& value) {
     return isText(value) ? plainName(value.text) : std::to_string(value.integer);
 }
@@ -97,7 +97,7 @@ std::string spellingOf(const FbxNode& node, bool hasIds) {
     return hasIds ? std::to_string(extensions::fileIdOf(node)) : std::string(node.GetName());
 }
 
-/// The spellings of what the file puts below the root or another node.
+/// The nodes that the file connects to the root or to another node.
 std::set<std::string> heldModels(const extensions::RecordFile& file) {
     std::set<std::string> models{"0"};
     forEachObjectRecord(file, [&models](const extensions::FileRecord& record) {
@@ -295,16 +295,15 @@ void oddNames(const LintContext& context, LintReport& report) {
 }
 
 void unparentedNodes(const LintContext& context, LintReport& report) {
-    constexpr int kOldestWithConnections = 6000; // older files have their tree in the nodes
+    constexpr int kOldestWithConnections = 6000; // older files list children in their parents
     if (headerOf(context).mFileVersion < kOldestWithConnections)
         return;
     const std::set<std::string> held = heldModels(context.records());
     for (const TreeNode& each : context.nodes) {
-        // The platform places at the root what nothing holds.
+        // The platform places nodes without a parent below the root.
         if (each.depth == 0 && !isOfViews(*each.node) && !held.contains(spellingOf(*each.node, context.file.hasIds())))
-            report.add(each.node->GetName(), each.node->GetChildCount() == 0
-                                                 ? "nothing holds it"
-                                                 : "nothing holds it, and others hang below it");
+            report.add(each.node->GetName(),
+                       each.node->GetChildCount() == 0 ? "it has no parent" : "it has no parent, but descendants");
     }
 }
 

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Rates, takes and keys.
+// Checks of rates, takes and keys.
 #include <algorithm>
 #include <cmath>
 
@@ -77,7 +77,7 @@ void takeWithoutSpan(const LintContext& context, LintReport& report) {
 
 void takeWithoutKeys(const LintContext& context, LintReport& report) {
     const auto& channels = context.channelsByTake;
-    // Nothing takes the place of anything in a scene that stands still.
+    // Not of static scenes.
     if (std::all_of(channels.begin(), channels.end(), [](const auto& each) { return each.empty(); }))
         return;
     for (std::size_t i = 0; i < context.takes.size(); ++i) {

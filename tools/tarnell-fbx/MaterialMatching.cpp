@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Materials by their names, then by their places.
+// Materials by their names, then by their slots.
 #include "MaterialMatching.h"
 
 #include <algorithm>

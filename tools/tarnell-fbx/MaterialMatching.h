@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Which materials of two scenes are the same.
+// Matches the materials of two scenes.
 #pragma once
 
 #include <vector>
@@ -17,8 +17,8 @@ struct MaterialPair {
     FbxSurfaceMaterial* b = nullptr;
 };
 
-/// Materials match by their names, several of one name in their order; what is left matches where nodes that belong
-/// together have it at the same place (it was renamed).
+/// Materials match by their names, several of one name in their order; the remaining ones match if nodes that match
+/// have them in the same slot (renamed).
 std::vector<MaterialPair> matchMaterials(FbxScene& a, FbxScene& b, const std::vector<NodePair>& nodes);
 
 } // namespace tool

@@ -63,7 +63,7 @@ public:
         mJson.endArray();
     }
 
-    /// What `lint` finds, rule by rule.
+    /// The findings of `lint`, rule by rule.
     void findings(const LintFindings& found) {
         const std::vector<Finding>& findings = found.all;
         mJson.key("findings");
@@ -191,7 +191,7 @@ private:
         mJson.endArray();
     }
 
-    /// What `camera` says beside the channels.
+    /// The data of `camera` besides the channels.
     void print(const TnFbxCamera& camera, const FbxNode& node) {
         mJson.key("camera");
         mJson.beginObject();
@@ -293,7 +293,7 @@ private:
     }
 
     const ReportScene& mScene;
-    ReportArrays* mArrays; ///< null: arrays stand in the document
+    ReportArrays* mArrays; ///< null: arrays are inline
     JsonWriter& mJson;
 };
 

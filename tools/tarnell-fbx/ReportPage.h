@@ -13,8 +13,8 @@
 
 namespace tool {
 
-/// The keys of one file's document. Its long arrays go to `arrays`, and the document says where; without `arrays` they
-/// stand in the document itself.
+/// The keys of one file's document. Its long arrays are added to `arrays`, and the document has their offsets; without
+/// `arrays` they are inline.
 void printReport(const std::string& file, const ReportScene& scene, ReportArrays* arrays, JsonWriter& json);
 
 /// Writes a page: begin, then for each file its document and its arrays, then end.

@@ -151,7 +151,7 @@ void ReportScene::boundFrames(const ReportWishes& wishes) {
         first += (mSampleStep - (first % mSampleStep + mSampleStep) % mSampleStep) % mSampleStep;
         first = std::min(first, last);
     }
-    // Takes may claim what no frame number can name; sampled ones stay on their samples.
+    // Takes may exceed the range of frame numbers. A multiple of the step, as the samples are.
     const long long furthest = 2'000'000'000 / mSampleStep * mSampleStep;
     if (first < -furthest || last > furthest)
         note("Frames beyond " + std::to_string(furthest) + " are left out.");

@@ -30,8 +30,8 @@ namespace {
 template <class Real>
 std::string shortest(Real value) {
     if (std::isnan(value))
-        return "nan"; // whose sign says nothing
-    // Shortest alone would have 100000 as 1e+05.
+        return "nan"; // the sign has no meaning
+    // The shortest form by itself would give 100000 as 1e+05.
     constexpr double kSmall = 1e-5, kLarge = 1e15;
     const double size = std::abs(static_cast<double>(value));
     const bool isUsual = (size >= kSmall && size < kLarge) || size == 0.0;

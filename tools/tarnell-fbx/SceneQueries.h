@@ -28,10 +28,10 @@ std::vector<TreeNode> nodesInOrder(FbxScene& scene);
 /// Whether any curve of any take drives the property.
 bool isAnimated(const FbxProperty& property);
 
-/// The channels of the blend shapes that deform what the node shows.
+/// The channels of the blend shapes of the node's geometry.
 std::vector<FbxBlendShapeChannel*> blendChannelsOf(FbxNode& node);
 
-/// Whether the node is a camera of the application's own views.
+/// Whether the node is a producer camera, one of an application's own views.
 bool isProducer(const FbxNode& node);
 
 /// Whether a faithful write made the node only to skew the one below it, as it does wherever that is written again.
@@ -43,7 +43,7 @@ std::vector<FbxProperty> propertiesOf(const FbxObject& object);
 /// The scene's objects of that name: nodes first, then the others.
 std::vector<FbxObject*> objectsNamed(FbxScene& scene, const std::string& name);
 
-/// What people call the object: what has no name of its own is called by its node.
+/// The name of the object for people: an attribute without a name has that of its node.
 std::string spokenName(const FbxObject& object);
 
 /// The class without the prefix that all classes have: "Node", "Camera", "AnimLayer".

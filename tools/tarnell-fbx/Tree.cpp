@@ -19,7 +19,7 @@ namespace {
 
 /// The data of a node besides its name and kind.
 struct NodeFacts {
-    bool animated = false; ///< itself, one of its attributes or its blend shapes
+    bool animated = false; ///< itself, one of its attributes or blend shapes
     bool hidden = false;
     const char* rotationOrder = "XYZ"; ///< the effective one
     std::string target;
