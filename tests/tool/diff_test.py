@@ -389,6 +389,15 @@ class Failures(Folder):
         other = scenes.scene(span=(0, 2400000000), keyed=False, camera={"FocalLength": 50.0})
         self.assertIn("focalLength", [each["what"] for each in self.diff(still, other)])
 
+    def test_of_materials_keyed_over_billions_of_frames_are_prompt(self):
+        text = scenes.scene(span=(0, 2400000000), objects=scenes.record("Material", 30, "Material::paint", "", {
+            "DiffuseFactor": 1.0}), connections='C: "OO",30,20\n', on=30, animated="DiffuseFactor",
+                            channel="d|DiffuseFactor")
+        a, b = self.file("a.fbx", text), self.file("b.fbx", text)
+        result = run("diff", a, b)
+        self.assertEqual((result.returncode, result.stdout), (1, ""))
+        self.assertIn("frames, and at most 16777216 are compared", result.stderr)
+
     def test_name_the_file(self):
         missing = os.path.join(self.folder, "missing.fbx")
         for arguments in ((SHOT, missing), (missing, SHOT)):

@@ -82,6 +82,10 @@ private:
     }
 
     void compareMoments(const FbxProperty& a, const FbxProperty& b) {
+        constexpr std::size_t kMostFrames = 1 << 24; // as channels of the library
+        if (mComparison.moments.size() > kMostFrames)
+            throw Unreadable("the animation has " + std::to_string(mComparison.moments.size()) +
+                             " frames, and at most " + std::to_string(kMostFrames) + " are compared");
         std::vector<Channel> one = channelsOf(a, mComparison.a.stack), other = channelsOf(b, mComparison.b.stack);
         for (std::size_t i = 0; i < std::min(one.size(), other.size()); ++i) {
             const auto timeOf = [](double frame, const DiffSide& side) {
