@@ -4,6 +4,7 @@
 // tarnell-fbx curve: the keys of an object's channels as the file has them, and samples between them.
 #include <algorithm>
 #include <cmath>
+#include <map>
 
 #include <strings.h>
 
