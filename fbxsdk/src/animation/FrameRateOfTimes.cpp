@@ -52,8 +52,9 @@ double usualDistance(std::span<const std::int64_t> times) {
     double usual = 0.0;
     for (std::size_t begin = 0; begin < distances.size();) {
         constexpr std::uint64_t kRounding = 400; // of a writer that counts 141120000 ticks per second
-        const auto next = std::upper_bound(distances.begin() + static_cast<std::ptrdiff_t>(begin), distances.end(),
-                                           distances[begin] + kRounding);
+        const std::uint64_t least = distances[begin];
+        const auto next = std::find_if(distances.begin() + static_cast<std::ptrdiff_t>(begin), distances.end(),
+                                       [&](std::uint64_t distance) { return distance - least > kRounding; });
         const auto end = static_cast<std::size_t>(next - distances.begin());
         if (end - begin > most) {
             most = end - begin;

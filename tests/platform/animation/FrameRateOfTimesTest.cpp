@@ -6,6 +6,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdint>
+#include <limits>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -80,6 +82,14 @@ TEST(FrameRateOfTimes, DoesNotFollowAFewKeysBetweenFrames) {
 
 TEST(FrameRateOfTimes, FollowsKeysThatAllStandOnHalfFrames) {
     EXPECT_EQ(frameRateOfTimes(timesAt(48.0, 0, 100)), 48.0);
+}
+
+TEST(FrameRateOfTimes, EndsForTimesAtBothEndsOfTheirRange) {
+    using Limits = std::numeric_limits<std::int64_t>;
+    for (const std::int64_t inset : {0, 1, 200, 401}) {
+        EXPECT_GE(frameRateOfTimes(Times{Limits::min() + inset, Limits::max() - inset}), 0.0);
+        EXPECT_EQ(frameRateOfTimes(with(timesAt(24.0, 1, 100), Limits::max() - inset)), 24.0);
+    }
 }
 
 TEST(FrameRateOfTimes, IsNoneWhereNothingTellsOne) {
