@@ -36,6 +36,10 @@ public:
     /// apply to all reads. To be called once.
     bool load(const TnFbxReadInfo& info);
 
+    /// Selects the stack and the frames that the options name, of the loaded file; the options apply to all reads from
+    /// now on. After a failure the former ones do.
+    bool select(const TnFbxReadInfo& info);
+
     /// The scene of the file, null before one is loaded. It and its objects belong to this object, and the host must
     /// not change them.
     fbxsdk::FbxScene* getScene() const;

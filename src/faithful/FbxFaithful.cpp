@@ -6,6 +6,8 @@
 #include "Scene.h"
 #include "calls/LastError.h"
 
+#include <string>
+
 namespace Tarnell::Fbx {
 
 struct FbxFaithful::File {
@@ -32,6 +34,21 @@ bool FbxFaithful::load(const TnFbxReadInfo& info) {
     mFile->info = info;
     return call(info, [&] {
         return info.getFileName().empty() ? detail::fail("the read options name no file") : mFile->scene.load(info);
+    });
+}
+
+bool FbxFaithful::select(const TnFbxReadInfo& info) {
+    return call(mFile->info, [&] {
+        if (!mFile->scene.isLoaded()) {
+            return detail::fail("no file is loaded");
+        }
+        if (!mFile->scene.select(info)) {
+            return false;
+        }
+        const std::string fileName = mFile->info.getFileName();
+        mFile->info = info;
+        mFile->info.setFileName(fileName);
+        return true;
     });
 }
 

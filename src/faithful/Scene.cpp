@@ -10,6 +10,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstddef>
+#include <utility>
 
 namespace Tarnell::Fbx::faithful {
 
@@ -96,7 +97,22 @@ bool Scene::load(const TnFbxReadInfo& info) {
     const double left = settings.GetSystemUnit().GetScaleFactor(); // a unit that is not a number
     mUnit = left < 1.0 || left > 1.0 || std::isnan(left) ? 1.0 : unit;
     detail::convertToYUp(*mScene);
-    return selectStack(info.getAimationStackName()) && selectFrames(info);
+    return select(info);
+}
+
+bool Scene::select(const TnFbxReadInfo& info) {
+    fbxsdk::FbxAnimStack* const formerStack = mStack;
+    const std::vector<fbxsdk::FbxAnimLayer*> formerLayers = mLayers;
+    if (selectStack(info.getAimationStackName()) && selectFrames(info)) {
+        mMoves.clear();
+        return true;
+    }
+    mStack = formerStack;
+    mLayers = formerLayers;
+    if (mStack != nullptr) {
+        mScene->SetCurrentAnimationStack(mStack);
+    }
+    return false;
 }
 
 bool Scene::selectStack(const std::string& name) {
@@ -122,8 +138,12 @@ bool Scene::selectFrames(const TnFbxReadInfo& info) {
     if (!std::isfinite(rate) || !(rate > 0.0)) {
         return fail("a sample rate of " + std::to_string(rate) + " frames per second is not valid");
     }
-    mTimeline = Timeline(rate, animatedSpan());
-    return setFrame(info.getFrame());
+    const Timeline former = std::exchange(mTimeline, Timeline(rate, animatedSpan()));
+    if (setFrame(info.getFrame())) {
+        return true;
+    }
+    mTimeline = former;
+    return false;
 }
 
 bool Scene::setFrame(float frame) {

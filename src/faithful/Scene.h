@@ -28,6 +28,10 @@ public:
     /// To be called once. False, with the reason noted, when the file cannot be read or lacks what the options name.
     bool load(const TnFbxReadInfo& info);
 
+    /// Selects another stack and other frames. False, with the reason noted, when the options name none that exist;
+    /// the former ones stay.
+    bool select(const TnFbxReadInfo& info);
+
     bool isLoaded() const { return mScene != nullptr; }
     fbxsdk::FbxManager* manager() const { return mManager; }
     fbxsdk::FbxScene& scene() const { return *mScene; }

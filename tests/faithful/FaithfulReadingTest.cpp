@@ -4,8 +4,12 @@
 // Which stack and which frames are read, and the placement of objects.
 #include "FaithfulFixture.h"
 
+#include "FbxFaithful.h"
 #include "TnFbxError.h"
 #include "TnFbxLimits.h"
+
+#include <memory>
+#include <utility>
 
 namespace Tarnell::Fbx::test {
 namespace {
@@ -40,6 +44,44 @@ TEST(FaithfulReading, FailsForAStackThatIsNotThereAndSaysWhichAre) {
     EXPECT_EQ(nulls, nullptr);
     EXPECT_THAT(lastError(), testing::HasSubstr("two_stacks_7400_ascii.fbx"));
     EXPECT_THAT(lastError(), testing::HasSubstr("\"walk\", \"run\""));
+}
+
+std::unique_ptr<TnFbxNull[]> nullsOf(FbxFaithful& file) {
+    TnFbxNull* nulls = nullptr;
+    int count = 0;
+    EXPECT_TRUE(file.readAll(&nulls, count)) << lastError();
+    EXPECT_GT(count, 0);
+    return std::unique_ptr<TnFbxNull[]>(nulls);
+}
+
+TEST(FaithfulReading, SelectsOneStackAfterTheOtherOfALoadedFile) {
+    for (const auto& [first, second] : {std::pair("walk", "run"), std::pair("run", "walk")}) {
+        FbxFaithful file;
+        EXPECT_FALSE(file.select(stackNamed(first))) << "nothing is loaded";
+        ASSERT_TRUE(file.load(stackNamed(first))) << lastError();
+        for (const char* const name : {first, second, first}) {
+            ASSERT_TRUE(file.select(stackNamed(name))) << lastError();
+            const auto nulls = nullsOf(file);
+            const FacadeRead<TnFbxNull> expected(stackNamed(name));
+            EXPECT_EQ(file.getFirstFrame(), expected.objects[0].getTransformTime(kX).getStartFrame());
+            EXPECT_EQ(nulls[0].getTransformTime(kX).getStartFrame(),
+                      expected.objects[0].getTransformTime(kX).getStartFrame());
+            for (const float frame : {0.0f, 5.0f, 1001.0f, 1010.0f})
+                EXPECT_EQ(nulls[0].getTransformValueAt(kX, frame), expected.objects[0].getTransformValueAt(kX, frame));
+        }
+    }
+}
+
+TEST(FaithfulReading, KeepsTheStackAndTheFramesWhenOthersCannotBeSelected) {
+    FbxFaithful file;
+    ASSERT_TRUE(file.load(stackNamed("walk"))) << lastError();
+    TnFbxReadInfo nowhere = stackNamed("run");
+    nowhere.setFrame(std::numeric_limits<float>::quiet_NaN());
+    for (const TnFbxReadInfo& info : {stackNamed("jump"), nowhere}) {
+        EXPECT_FALSE(file.select(info));
+        EXPECT_EQ(file.getFirstFrame(), 1001);
+        EXPECT_EQ(nullsOf(file)[0].getTransformTime(kX).getStartFrame(), 1001);
+    }
 }
 
 TEST(FaithfulReading, FailsForASampleRateOrAFrameThatIsNone) {
