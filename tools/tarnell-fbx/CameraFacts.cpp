@@ -12,7 +12,6 @@
 
 #include "CameraOrigins.h"
 #include "Curves.h"
-#include "FaithfulRead.h"
 #include "Placing.h"
 #include "SceneFacts.h"
 #include "SceneQueries.h"
@@ -260,10 +259,32 @@ CameraMoment CameraFacts::at(double frame) const {
 }
 
 CameraList camerasOf(const std::string& file, const SceneFile& opened, const std::string& takeName) {
-    FbxAnimStack* take = opened.chooseTake(takeName);
-    FbxScene& scene = opened.scene();
+    return CameraReader(file, opened).read(takeName);
+}
+
+FaithfulObjects<TnFbxCamera> CameraReader::readObjects(const Tarnell::Fbx::TnFbxReadInfo& info) {
+    FaithfulObjects<TnFbxCamera> result;
+    const auto check = [&result](bool done) {
+        if (!done)
+            throw Unreadable(Tarnell::Fbx::lastError());
+        const std::vector<std::string> warnings = Tarnell::Fbx::lastWarnings();
+        result.warnings.insert(result.warnings.end(), warnings.begin(), warnings.end());
+    };
+    check(mValues.getScene() ? mValues.select(info) : mValues.load(info));
+    TnFbxCamera* objects = nullptr;
+    int count = 0;
+    const bool done = mValues.readAll(&objects, count);
+    result.objects.reset(objects);
+    result.count = static_cast<std::size_t>(count);
+    check(done);
+    return result;
+}
+
+CameraList CameraReader::read(const std::string& takeName) {
+    FbxAnimStack* take = mOpened.chooseTake(takeName);
+    FbxScene& scene = mOpened.scene();
     CameraList list;
-    list.take = takeFacts(opened, take);
+    list.take = takeFacts(mOpened, take);
     list.unit = scene.GetGlobalSettings().GetSystemUnit().GetScaleFactor();
     const Axes axes = axesOf(scene.GetGlobalSettings().GetAxisSystem());
     list.axes =
@@ -271,11 +292,11 @@ CameraList camerasOf(const std::string& file, const SceneFile& opened, const std
     const std::vector<FbxNode*> nodes = cameraNodes(scene);
     if (nodes.empty())
         return list;
-    Tarnell::Fbx::TnFbxReadInfo info = faithfulInfo(file, takeName);
+    Tarnell::Fbx::TnFbxReadInfo info = faithfulInfo(mFile, takeName);
     info.setFrame(static_cast<float>(list.take.firstFrame));
-    auto read = readFaithfully<TnFbxCamera>(info, &Tarnell::Fbx::Fbx::getCameras);
+    auto read = readObjects(info);
     list.warnings = std::move(read.warnings);
-    const CameraGathering gathering(opened, take, list.take);
+    const CameraGathering gathering(mOpened, take, list.take);
     for (std::size_t i = 0; i < nodes.size(); ++i) {
         if (i >= read.count || read.objects.get()[i].getName() != nodes[i]->GetName())
             throw Unreadable("the file changed while it was read");

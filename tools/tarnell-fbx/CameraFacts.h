@@ -9,15 +9,15 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
+#include "FaithfulRead.h"
+#include "FbxFaithful.h"
 #include "Optics.h"
 #include "SceneFile.h"
 #include "TakeFacts.h"
-
-namespace Tarnell::Fbx {
-class TnFbxCamera;
-}
+#include "TnFbxCamera.h"
 
 namespace tool {
 
@@ -122,6 +122,20 @@ struct CameraList {
 /// The file's cameras, parents before their children, without those of the application's views. Reads the file once
 /// more, through the library. Throws Unreadable.
 CameraList camerasOf(const std::string& file, const SceneFile& opened, const std::string& takeName);
+
+/// The same for several takes: the file is read once.
+class CameraReader {
+public:
+    CameraReader(std::string file, const SceneFile& opened) : mFile(std::move(file)), mOpened(opened) {}
+    CameraList read(const std::string& takeName);
+
+private:
+    FaithfulObjects<Tarnell::Fbx::TnFbxCamera> readObjects(const Tarnell::Fbx::TnFbxReadInfo& info);
+
+    std::string mFile;
+    const SceneFile& mOpened;
+    Tarnell::Fbx::FbxFaithful mValues;
+};
 
 const char* driverText(LensDriver driver);
 

@@ -3,8 +3,11 @@
 //
 // The traversal for the checks of the rules, take by take, and their findings.
 #include <algorithm>
+#include <iterator>
 #include <map>
+#include <set>
 #include <tuple>
+#include <unordered_map>
 #include <unordered_set>
 
 #include <fbxsdk/extensions/FileFacts.h>
@@ -65,7 +68,7 @@ std::unordered_set<const FbxObject*> cameraSources(const std::vector<TreeNode>& 
 /// Makes one take after the other the current one.
 class TakeVisitor {
 public:
-    explicit TakeVisitor(LintContext& context) : mContext(context) {
+    explicit TakeVisitor(LintContext& context) : mContext(context), mCameras(context.fileName, context.file) {
         if (context.takes.size() > 1)
             mCameraSources = cameraSources(context.nodes);
     }
@@ -91,8 +94,7 @@ public:
     }
 
 private:
-    /// Whether the cameras of the take may differ from those of the first one, or be unreadable: the file is read
-    /// again.
+    /// Whether the cameras of the take may differ from those of the first one, or be unreadable.
     [[nodiscard]] bool mayHaveOtherCameras(std::size_t index) const {
         constexpr long long kManyFrames = 1 << 20;
         return mFirstIsUnreadable || drivesCameras(0) || drivesCameras(index) ||
@@ -115,13 +117,14 @@ private:
     void readCameras(const std::string& take) {
         mContext.cameras = std::make_shared<CameraList>();
         try {
-            mContext.cameras = std::make_shared<CameraList>(camerasOf(mContext.fileName, mContext.file, take));
+            mContext.cameras = std::make_shared<CameraList>(mCameras.read(take));
         } catch (const Unreadable& reason) {
             mContext.unreadable = reason.what();
         }
     }
 
     LintContext& mContext;
+    CameraReader mCameras;
     std::unordered_set<const FbxObject*> mCameraSources;
     std::shared_ptr<const CameraList> mFirst;
     bool mFirstIsUnreadable = false;
@@ -143,7 +146,9 @@ private:
 /// Merges the findings of takes: one that holds in several becomes one with the names of these.
 class TakeFindings {
 public:
-    void add(std::vector<Finding> found, const TakeFacts& take) {
+    void add(std::vector<Finding> found, const TakeFacts& take) { add(std::move(found), {&take}); }
+    /// The same of findings that hold in several.
+    void add(std::vector<Finding> found, const std::vector<const TakeFacts*>& takes) {
         std::map<Key, int> seen; // equal findings of one take stay separate
         for (Finding& finding : found) {
             Key key{finding.rule, finding.object, finding.text, 0};
@@ -151,8 +156,10 @@ public:
             const auto [known, isNew] = mPlaces.try_emplace(std::move(key), mFindings.size());
             if (isNew)
                 mFindings.push_back(std::move(finding));
-            if (take.exists)
-                mFindings[known->second].takes.push_back(take.name);
+            for (const TakeFacts* take : takes) {
+                if (take->exists)
+                    mFindings[known->second].takes.push_back(take->name);
+            }
         }
     }
     std::vector<Finding> take() { return std::move(mFindings); }
@@ -162,6 +169,10 @@ private:
     std::map<Key, std::size_t> mPlaces;
     std::vector<Finding> mFindings;
 };
+
+void append(std::vector<Finding> found, std::vector<Finding>& findings) {
+    findings.insert(findings.end(), std::make_move_iterator(found.begin()), std::make_move_iterator(found.end()));
+}
 
 /// The findings of the checks of the file, or of those of the current take.
 std::vector<Finding> findingsOf(const LintContext& context, const std::vector<std::string>& ids,
@@ -175,6 +186,125 @@ std::vector<Finding> findingsOf(const LintContext& context, const std::vector<st
     }
     return std::move(report.findings);
 }
+
+/// Which nodes the keys of a take move, themselves or one above them, as indices in the order of the tree. All others
+/// are the same in every take of that kind, so that they are checked once.
+class MovedNodes {
+public:
+    explicit MovedNodes(const LintContext& context) : mTakes(context.nodes.size()) {
+        for (std::size_t i = 0; i < context.nodes.size(); ++i)
+            mIndices.emplace(context.nodes[i].node, i);
+        for (std::size_t take = 0; take < context.channelsByTake.size(); ++take) {
+            std::set<std::size_t> moved;
+            for (const KeyedChannel& keyed : context.channelsByTake[take])
+                addNodesOf(*keyed.object, moved);
+            for (const std::size_t node : moved)
+                mTakes[node].push_back(take);
+            mNodes.emplace_back(moved.begin(), moved.end());
+        }
+    }
+
+    [[nodiscard]] const std::vector<std::size_t>& in(std::size_t take) const { return mNodes[take]; }
+    [[nodiscard]] bool isMoved(std::size_t node, std::size_t take) const {
+        return std::binary_search(mTakes[node].begin(), mTakes[node].end(), take);
+    }
+    [[nodiscard]] bool isEverMoved(std::size_t node) const { return !mTakes[node].empty(); }
+
+private:
+    void addNodesOf(const FbxObject& object, std::set<std::size_t>& moved) const {
+        if (const auto* node = FbxCast<FbxNode>(&object))
+            return addBelow(*node, moved);
+        const auto* attribute = FbxCast<FbxNodeAttribute>(&object);
+        for (int i = 0; attribute && i < attribute->GetNodeCount(); ++i)
+            addBelow(*attribute->GetNode(i), moved);
+    }
+
+    void addBelow(const FbxNode& top, std::set<std::size_t>& moved) const {
+        std::vector<const FbxNode*> pending{&top};
+        while (!pending.empty()) {
+            const FbxNode* node = pending.back();
+            pending.pop_back();
+            const auto known = mIndices.find(node);
+            if (known == mIndices.end() || !moved.insert(known->second).second)
+                continue;
+            for (int i = 0; i < node->GetChildCount(); ++i)
+                pending.push_back(node->GetChild(i));
+        }
+    }
+
+    std::unordered_map<const FbxNode*, std::size_t> mIndices;
+    std::vector<std::vector<std::size_t>> mNodes; ///< by take
+    std::vector<std::vector<std::size_t>> mTakes; ///< by node
+};
+
+/// The checks of all takes of a file with several: of a take its channels, its cameras and the nodes that it moves, and
+/// of each node once how it is in the takes that do not move it.
+class TakeChecks {
+public:
+    TakeChecks(LintContext& context, const std::vector<std::string>& ids)
+        : mContext(context), mIds(ids), mMoved(context), mNodes(context.nodes) {
+        for (std::size_t i = 0; i < mNodes.size(); ++i)
+            mPending.push_back(i);
+    }
+
+    /// The take must be the current one.
+    void check(std::size_t take) {
+        select(mMoved.in(take));
+        mFindings.add(run(), mContext.take);
+        checkAtRest(take);
+    }
+    std::vector<Finding> take() { return mFindings.take(); }
+
+private:
+    void checkAtRest(std::size_t take) {
+        // Only the checks of nodes find something.
+        const std::vector<KeyedChannel> noChannels;
+        mContext.channels = &noChannels;
+        mContext.cameras = std::make_shared<CameraList>();
+        mContext.unreadable.clear();
+        std::vector<std::size_t> still, left;
+        for (const std::size_t node : mPending) {
+            if (mMoved.isMoved(node, take)) {
+                left.push_back(node);
+            } else if (!mMoved.isEverMoved(node)) {
+                still.push_back(node);
+            } else {
+                select({node});
+                if (std::vector<Finding> found = run(); !found.empty())
+                    mFindings.add(std::move(found), takesAtRest(node));
+            }
+        }
+        mPending = std::move(left);
+        if (still.empty())
+            return;
+        select(still);
+        if (std::vector<Finding> found = run(); !found.empty())
+            mFindings.add(std::move(found), takesAtRest(still.front()));
+    }
+
+    void select(const std::vector<std::size_t>& nodes) {
+        mContext.nodes.clear();
+        for (const std::size_t node : nodes)
+            mContext.nodes.push_back(mNodes[node]);
+    }
+    [[nodiscard]] std::vector<Finding> run() const { return findingsOf(mContext, mIds, &LintRule::checkInTake); }
+
+    [[nodiscard]] std::vector<const TakeFacts*> takesAtRest(std::size_t node) const {
+        std::vector<const TakeFacts*> takes;
+        for (std::size_t take = 0; take < mContext.takes.size(); ++take) {
+            if (!mMoved.isMoved(node, take))
+                takes.push_back(&mContext.takes[take]);
+        }
+        return takes;
+    }
+
+    LintContext& mContext;
+    const std::vector<std::string>& mIds;
+    MovedNodes mMoved;
+    std::vector<TreeNode> mNodes;      ///< all
+    std::vector<std::size_t> mPending; ///< whose values at rest no take has shown yet
+    TakeFindings mFindings;
+};
 
 } // namespace
 
@@ -232,14 +362,19 @@ LintFindings lintFindings(const std::string& file, const SceneFile& opened, cons
     TakeVisitor visitor(context);
     visitor.enter(0);
     LintFindings findings{findingsOf(context, ids, &LintRule::check), context.takes.size()};
-    TakeFindings inTakes;
-    for (std::size_t take = 0; take < context.channelsByTake.size(); ++take) {
-        if (take > 0)
-            visitor.enter(take);
-        inTakes.add(findingsOf(context, ids, &LintRule::checkInTake), context.take);
+    if (context.takes.size() < 2) {
+        TakeFindings inTake;
+        inTake.add(findingsOf(context, ids, &LintRule::checkInTake), context.take);
+        append(inTake.take(), findings.all);
+    } else {
+        TakeChecks inTakes(context, ids);
+        for (std::size_t take = 0; take < context.takes.size(); ++take) {
+            if (take > 0)
+                visitor.enter(take);
+            inTakes.check(take);
+        }
+        append(inTakes.take(), findings.all);
     }
-    for (Finding& finding : inTakes.take())
-        findings.all.push_back(std::move(finding));
     std::stable_sort(findings.all.begin(), findings.all.end(),
                      [](const Finding& a, const Finding& b) { return a.rule < b.rule; });
     return findings;

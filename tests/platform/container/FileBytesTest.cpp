@@ -128,12 +128,29 @@ TEST_F(FileBytesTest, ComeThroughPipes) {
     file->requireUnchanged();
 }
 
+TEST(SmallFileBytes, AreAllReadWhenTheFileIsOpened) {
+    const support::TemporaryFolder folder;
+    const std::string name = folder.write("file", "the old content");
+    FbxStatus status;
+    const auto file = FileBytes::open(name, status);
+    ASSERT_NE(file, nullptr) << status.GetErrorString();
+    EXPECT_TRUE(file->isComplete());
+    (void)folder.write("file", "new");
+
+    EXPECT_EQ(std::string(file->bytes().data(), file->bytes().size()), "the old content");
+    file->requireUnchanged();
+
+    const auto large = FileBytes::open(folder.write("large", std::string(70000, 'x')), status);
+    ASSERT_NE(large, nullptr) << status.GetErrorString();
+    EXPECT_FALSE(large->isComplete());
+}
+
 #if defined(__has_feature)
 #if __has_feature(address_sanitizer)
 TEST(FileBytesDeathTest, LetsTheSanitizerSeeALookAtBytesThatWereNotFetched) {
     const support::TemporaryFolder folder;
     FbxStatus status;
-    const auto file = FileBytes::open(folder.write("file", std::string(5000, 'x')), status);
+    const auto file = FileBytes::open(folder.write("file", std::string(100000, 'x')), status);
     ASSERT_NE(file, nullptr) << status.GetErrorString();
     file->fetch(file->bytes().first(100));
 
