@@ -267,7 +267,7 @@ FaithfulObjects<TnFbxCamera> CameraReader::readObjects(const Tarnell::Fbx::TnFbx
     const auto check = [&result](bool done) {
         if (!done)
             throw Unreadable(Tarnell::Fbx::lastError());
-        const std::vector<std::string> warnings = Tarnell::Fbx::lastWarnings();
+        const std::vector<std::string>& warnings = Tarnell::Fbx::lastWarnings();
         result.warnings.insert(result.warnings.end(), warnings.begin(), warnings.end());
     };
     check(mValues.getScene() ? mValues.select(info) : mValues.load(info));
