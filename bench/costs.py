@@ -41,7 +41,8 @@ def measured(command: list, valgrind: str | None) -> dict:
 
 def all_costs(programs: Path, valgrind: str | None) -> dict:
     costs = {}
-    with tempfile.TemporaryDirectory() as folder:
+    # Always in the same folder: longer file names take more allocations.
+    with tempfile.TemporaryDirectory(dir="/tmp") as folder:
         subprocess.run([programs / "generate_inputs", folder, SCALE], check=True)
         for name, mode in READS:
             command = [programs / "bench_read_tarnell", mode, Path(folder) / f"{name}.fbx"]
