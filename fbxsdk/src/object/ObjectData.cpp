@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <new>
+#include <utility>
 
 #include "object/ManagerData.h"
 #include "schema/PropertyFlags.h"
@@ -26,13 +27,6 @@ static_assert(kCameraStereoRows.size() <= NameIndex::kMostRows, "no class has mo
 
 /// Up to this many dynamic properties are searched one by one; more get an index.
 constexpr std::size_t kUnindexedProperties = 32;
-
-void assignDefault(PropertyValue& value, const PropertyRow& row) {
-    value.numbers = row.numbers;
-    value.integer = static_cast<std::int64_t>(row.numbers[0]);
-    if (*row.text != '\0')
-        value.text = row.text;
-}
 
 /// Reserves memory for one more element, so that appending it cannot fail.
 void makeRoom(std::vector<PropertyData*>& list) {
@@ -139,10 +133,11 @@ PropertyData& ObjectData::materialise(int index) {
     if (place != mProperties.end() && (*place)->index == index)
         return **place;
     const PropertyRow& row = info->rows[static_cast<std::size_t>(index)];
+    PropertyValue value = defaultValue(row); // before the insertion: a text may take memory
     PropertyData& made = insertProperty(place, index, *row.type);
     made.row = &row;
     made.flags = defaultFlags(row);
-    assignDefault(made.value, row);
+    made.value = std::move(value);
     return made;
 }
 
@@ -187,7 +182,10 @@ int ObjectData::propertyCount() const {
 
 PropertyValue defaultValue(const PropertyRow& row) {
     PropertyValue value;
-    assignDefault(value, row);
+    value.numbers = row.numbers;
+    value.integer = static_cast<std::int64_t>(row.numbers[0]);
+    if (*row.text != '\0')
+        value.text = row.text;
     return value;
 }
 
