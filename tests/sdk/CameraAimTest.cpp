@@ -18,9 +18,6 @@ namespace Tarnell::Fbx {
 namespace {
 
 using namespace test;
-using Camera = TnFbxCamera;
-using Samples = std::vector<float>;
-using Transform = TnFbxTransform;
 
 constexpr auto kPositionX = Transform::kFbxTransformPositionX;
 constexpr auto kRotationX = Transform::kFbxTransformRotationX;

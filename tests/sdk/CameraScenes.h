@@ -12,6 +12,10 @@
 
 namespace Tarnell::Fbx::test {
 
+using Camera = TnFbxCamera;
+using Samples = std::vector<float>;
+using Transform = TnFbxTransform;
+
 struct ReadOptions {
     bool global = false;
     bool useInterestPosition = false;

@@ -12,9 +12,6 @@ namespace Tarnell::Fbx {
 namespace {
 
 using namespace test;
-using Camera = TnFbxCamera;
-using Samples = std::vector<float>;
-using Transform = TnFbxTransform;
 
 constexpr auto kRotationY = Transform::kFbxTransformRotationY;
 constexpr auto kRotationZ = Transform::kFbxTransformRotationZ;

@@ -16,8 +16,12 @@
 #include <array>
 #include <string>
 #include <tuple>
+#include <vector>
 
 namespace Tarnell::Fbx::test {
+
+using Samples = std::vector<float>;
+using Transform = TnFbxTransform;
 
 /// A version and whether the file is text.
 using Variant = std::tuple<int, bool>;

@@ -19,14 +19,9 @@
 namespace Tarnell::Fbx {
 namespace {
 
-using test::FacadeRead;
-using test::samplesOf;
-using test::timeOf;
-using test::WrittenObjects;
+using namespace test;
 using testing::ElementsAre;
 using testing::IsEmpty;
-using Samples = std::vector<float>;
-using Transform = TnFbxTransform;
 
 using RoundTrip = test::RoundTripFixture;
 INSTANTIATE_TEST_SUITE_P(EveryFile, RoundTrip, test::everyVariant(), test::variantName);

@@ -15,14 +15,9 @@
 namespace Tarnell::Fbx {
 namespace {
 
-using test::FacadeRead;
-using test::samplesOf;
-using test::timeOf;
-using test::WrittenObjects;
+using namespace test;
 using testing::ElementsAre;
 using testing::Pointwise;
-using Samples = std::vector<float>;
-using Transform = TnFbxTransform;
 
 using TimeRoundTrip = test::RoundTripFixture;
 INSTANTIATE_TEST_SUITE_P(EveryFile, TimeRoundTrip, test::everyVariant(), test::variantName);
