@@ -410,7 +410,7 @@ private:
     TARNELL_FBX_LOCAL void storeGlobalTransform(const TnFbxTime& time, fbxsdk::FbxNode& node,
                                                 fbxsdk::FbxAMatrix& geometric, TnFbxTransform& transform);
     TARNELL_FBX_LOCAL void setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& source,
-                                            const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh);
+                                            const fbxsdk::FbxAMatrix* bake, detail::MeshArrays& arrays);
     TARNELL_FBX_LOCAL detail::PropertySampler sampler(const TnFbxTime& time, bool useSampleFPS, float sampleFPS);
 
     bool mInitialized = false;

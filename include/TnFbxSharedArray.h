@@ -1,9 +1,10 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// An array whose copies share its elements until one of them is changed.
+// An array whose copies share its elements until one of them is changed. Equal elements at its end take no memory.
 #pragma once
 
+#include <algorithm>
 #include <atomic>
 #include <cstddef>
 #include <utility>
@@ -33,21 +34,44 @@ public:
         }
     }
 
-    std::size_t size() const noexcept { return mHeld != nullptr ? mHeld->elements.size() : 0; }
-    /// May be null when the array is empty.
-    const Element* data() const noexcept { return mHeld != nullptr ? mHeld->elements.data() : nullptr; }
+    std::size_t size() const noexcept { return mHeld != nullptr ? std::max(mHeld->elements.size(), mHeld->filled) : 0; }
+    /// The element at an index below the size.
+    const Element& operator[](std::size_t index) const noexcept {
+        return index < mHeld->elements.size() ? mHeld->elements[index] : mHeld->filler;
+    }
 
+    /// The elements that take memory: all but equal ones at the end, from `fill`. May be null when there are none.
+    const Element* stored() const noexcept { return mHeld != nullptr ? mHeld->elements.data() : nullptr; }
+    std::size_t storedCount() const noexcept { return mHeld != nullptr ? mHeld->elements.size() : 0; }
+    /// The value of the others, if any.
+    const Element* filler() const noexcept { return storedCount() < size() ? &mHeld->filler : nullptr; }
+
+    /// The same for arrays that share their elements, and for these only. Null for a new array.
+    const void* identity() const noexcept { return mHeld; }
     /// Whether another array shares the elements.
     bool isShared() const noexcept { return mHeld != nullptr && !isOwn(); }
 
-    /// The elements, for changing them: owned by this array alone afterwards, a copy where others share them.
-    std::vector<Element>& own() {
-        if (mHeld == nullptr) {
-            mHeld = new Held;
-        } else if (!isOwn()) {
-            *this = SharedArray(mHeld->elements);
+    /// Reserves memory for that many elements, so that changes up to there need no more. Throws std::bad_alloc.
+    void reserve(std::size_t count) { ownAsStored().elements.reserve(count); }
+
+    /// Appends elements with this value up to a count; existing ones stay. They take no memory until `own` is called.
+    void fill(std::size_t count, const Element& value) {
+        if (size() < count) {
+            Held& held = size() > storedCount() ? (own(), *mHeld) : ownAsStored();
+            held.filler = value;
+            held.filled = count;
         }
-        return mHeld->elements;
+    }
+
+    /// All elements, for changing them: owned by this array alone afterwards, a copy where others share them. Throws
+    /// std::bad_alloc; the array is unchanged then.
+    std::vector<Element>& own() {
+        Held& held = ownAsStored();
+        if (held.elements.size() < held.filled) {
+            held.elements.resize(held.filled, held.filler);
+        }
+        held.filled = 0;
+        return held.elements;
     }
 
     /// Removes all elements. The memory is kept, unless others share it.
@@ -56,6 +80,7 @@ public:
             *this = SharedArray();
         } else if (mHeld != nullptr) {
             mHeld->elements.clear();
+            mHeld->filled = 0;
         }
     }
 
@@ -63,9 +88,20 @@ private:
     struct Held {
         std::atomic<std::size_t> holders{1};
         std::vector<Element> elements;
+        std::size_t filled = 0; ///< the size, if there are more elements than stored ones
+        Element filler{};
     };
 
-    explicit SharedArray(const std::vector<Element>& elements) : mHeld(new Held{{1}, elements}) {}
+    explicit SharedArray(const Held& held) : mHeld(new Held{{1}, held.elements, held.filled, held.filler}) {}
+
+    Held& ownAsStored() {
+        if (mHeld == nullptr) {
+            mHeld = new Held;
+        } else if (!isOwn()) {
+            *this = SharedArray(*mHeld);
+        }
+        return *mHeld;
+    }
 
     /// Acquire: the last reader elsewhere is done with the elements before this array changes them.
     bool isOwn() const noexcept { return mHeld->holders.load(std::memory_order_acquire) == 1; }

@@ -4,6 +4,8 @@
 // The values of a layer element, corner by corner, without allocating.
 #pragma once
 
+#include "ItemReader.h"
+
 #include <fbxsdk.h>
 
 #include <optional>
@@ -33,11 +35,11 @@ public:
     explicit ElementValues(const fbxsdk::FbxLayerElementTemplate<Value>& element) {
         switch (element.GetReferenceMode()) {
         case fbxsdk::FbxLayerElement::eDirect:
-            mDirect = &element.GetDirectArray();
+            mDirect = ItemReader<Value>(element.GetDirectArray());
             break;
         case fbxsdk::FbxLayerElement::eIndexToDirect:
-            mDirect = &element.GetDirectArray();
-            mIndex = &element.GetIndexArray();
+            mDirect = ItemReader<Value>(element.GetDirectArray());
+            mIndex = ItemReader<int>(element.GetIndexArray());
             break;
         default: // an index alone refers to nothing
             break;
@@ -47,34 +49,31 @@ public:
     /// Values that are indices where the element has indices only.
     static ElementValues numbered(const fbxsdk::FbxLayerElementTemplate<Value>& element) {
         ElementValues values;
-        values.mDirect = &element.GetDirectArray();
+        values.mDirect = ItemReader<Value>(element.GetDirectArray());
         if (element.GetReferenceMode() != fbxsdk::FbxLayerElement::eDirect) {
-            values.mIndex = &element.GetIndexArray();
+            values.mIndex = ItemReader<int>(element.GetIndexArray());
         }
         return values;
     }
 
-    /// The values themselves where they have no index and there are at least that many; else null.
-    const fbxsdk::FbxLayerElementArrayTemplate<Value>* inOrder(int count) const {
-        return mIndex == nullptr && mDirect != nullptr && mDirect->GetCount() >= count ? mDirect : nullptr;
+    /// Whether they have no index and there are at least that many, so that they can be read in order.
+    bool areInOrder(int count) const { return !mIndex.hasArray() && mDirect.hasArray() && mDirect.count() >= count; }
+    /// Consecutive values that are in order.
+    void read(int first, int count, Value* values) const { mDirect.read(first, count, values); }
+
+    /// False when there is none; the value is unchanged then.
+    bool read(int position, Value& value) const {
+        return (!mIndex.hasArray() || mIndex.read(position, position)) && mDirect.read(position, value);
     }
 
     std::optional<Value> at(int position) const {
-        if (mIndex != nullptr) {
-            if (position < 0 || position >= mIndex->GetCount()) {
-                return std::nullopt;
-            }
-            position = mIndex->GetAt(position);
-        }
-        if (mDirect == nullptr || position < 0 || position >= mDirect->GetCount()) {
-            return std::nullopt;
-        }
-        return mDirect->GetAt(position);
+        Value value;
+        return read(position, value) ? std::optional<Value>(value) : std::nullopt;
     }
 
 private:
-    const fbxsdk::FbxLayerElementArrayTemplate<Value>* mDirect = nullptr;
-    const fbxsdk::FbxLayerElementArrayTemplate<int>* mIndex = nullptr;
+    mutable ItemReader<Value> mDirect; // reading moves their windows only
+    mutable ItemReader<int> mIndex;
 };
 
 } // namespace Tarnell::Fbx::detail

@@ -116,12 +116,10 @@ private:
 };
 
 void fillLayout(FbxMesh& source, const Corners& corners, MeshArrays& arrays) {
-    int* sizes = arrays.polygonVertexSizes();
     for (int polygon = 0; polygon < source.GetPolygonCount(); ++polygon) {
-        *sizes++ = source.GetPolygonSize(polygon);
+        arrays.addPolygonVertexSize(source.GetPolygonSize(polygon));
     }
-    int* indices = arrays.pointIndices();
-    corners.forEach([&indices](const Corner& corner) { *indices++ = corner.controlPoint; });
+    corners.forEach([&arrays](const Corner& corner) { arrays.addPointIndex(corner.controlPoint); });
 }
 
 // ---- Normals ----
@@ -257,18 +255,19 @@ void fillCorners(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed,
 void fillMesh(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, std::int64_t cornerCount,
               const MeshInstances::Geometry* alike, TnFbxMesh& mesh) {
     MeshArrays arrays(mesh);
+    bool hasPolygons = true;
     if (alike != nullptr) {
         arrays.allocateLike(*alike);
     } else if (!arrays.allocate(source.GetPolygonCount(), static_cast<int>(placed.points().size()),
                                 static_cast<int>(cornerCount))) {
         arrays.allocatePoints(static_cast<int>(placed.points().size()));
+        hasPolygons = false;
     }
-    if (mesh.getNumberOfPolygons() > 0) {
+    for (const FbxVector4& point : placed.points()) {
+        arrays.addControlPoint({toFloat(point[0]), toFloat(point[1]), toFloat(point[2])});
+    }
+    if (hasPolygons) {
         fillCorners(source, node, placed, alike != nullptr, arrays, mesh);
-    }
-    for (std::size_t i = 0; i < placed.points().size(); ++i) {
-        const FbxVector4& point = placed.points()[i];
-        mesh.setControlPoint(static_cast<int>(i), toFloat(point[0]), toFloat(point[1]), toFloat(point[2]));
     }
 }
 

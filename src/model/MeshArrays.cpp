@@ -26,17 +26,9 @@ void preferLargePages(void* memory, std::size_t size) {
 
 template <typename Element>
 void reserveExactly(SharedArray<Element>& array, std::size_t count) {
+    array.reserve(count);
     std::vector<Element>& elements = array.own();
-    elements.reserve(count);
     preferLargePages(elements.data(), elements.capacity() * sizeof(Element));
-}
-
-/// Elements up to a count for which memory is reserved; existing ones stay.
-template <typename Element>
-void fill(SharedArray<Element>& array, std::size_t count, const Element& value) {
-    if (array.size() < count) {
-        array.own().resize(count, value);
-    }
 }
 
 } // namespace
@@ -70,12 +62,12 @@ std::uint64_t MeshArrays::bytesOfAnother(std::int64_t controlPoints, std::int64_
 MeshArrays::Identity MeshArrays::identityOf(const TnFbxMesh& mesh) {
     const TnFbxMesh::Geometry& g = mesh.mGeometry;
     const auto flag = [](bool value) -> const void* { return value ? &kSet : nullptr; };
-    return {g.polygonVertexSizes.data(),
-            g.pointIndices.data(),
-            g.controlPoints.data(),
-            g.normals.data(),
-            g.uvs.data(),
-            g.colours.data(),
+    return {g.polygonVertexSizes.identity(),
+            g.pointIndices.identity(),
+            g.controlPoints.identity(),
+            g.normals.identity(),
+            g.uvs.identity(),
+            g.colours.identity(),
             flag(g.validNormals),
             flag(g.validUVs),
             flag(g.validColours)};
@@ -91,14 +83,12 @@ bool MeshArrays::allocate(int polygons, int controlPoints, int polygonVertices) 
     TnFbxMesh::Geometry& g = mMesh.mGeometry;
     reserveExactly(g.polygonVertexSizes, polygonCount);
     reserveExactly(g.pointIndices, cornerCount);
-    reserveExactly(g.controlPoints, static_cast<std::size_t>(controlPoints));
     reserveExactly(g.normals, cornerCount);
     reserveExactly(g.uvs, cornerCount);
     reserveExactly(g.colours, cornerCount);
-
-    fill(g.polygonVertexSizes, polygonCount, 0);
-    fill(g.pointIndices, cornerCount, 0);
-    addFirstSet(controlPoints);
+    addFirstSet(static_cast<std::size_t>(controlPoints));
+    mPolygonCount = polygonCount;
+    mCornerCount = cornerCount;
     mAllocated = true;
     return true;
 }
@@ -106,44 +96,48 @@ bool MeshArrays::allocate(int polygons, int controlPoints, int polygonVertices) 
 void MeshArrays::allocatePoints(int controlPoints) {
     mMesh.initMesh();
     if (controlPoints > 0) {
-        addFirstSet(controlPoints);
+        addFirstSet(static_cast<std::size_t>(controlPoints));
+        mPolygonCount = mCornerCount = 0;
+        mAllocated = true;
     }
 }
 
 void MeshArrays::allocateLike(const TnFbxMesh::Geometry& other) {
     mMesh.initMesh();
     TnFbxMesh::Geometry like = other;
+    const std::size_t cornerCount = like.pointIndices.size();
     like.normals = {};
     like.colours = {};
     like.controlPoints = {};
-    reserveExactly(like.normals, like.pointIndices.size());
-    reserveExactly(like.colours, like.pointIndices.size());
-    reserveExactly(like.controlPoints, static_cast<std::size_t>(like.controlPointCount));
+    reserveExactly(like.normals, cornerCount);
+    reserveExactly(like.colours, cornerCount);
     mMesh.mGeometry = like;
-    addFirstSet(other.controlPointCount);
+    addFirstSet(static_cast<std::size_t>(other.controlPointCount));
+    mPolygonCount = like.polygonVertexSizes.size();
+    mCornerCount = cornerCount;
     mAllocated = true;
 }
 
-void MeshArrays::addFirstSet(int controlPoints) {
-    fill(mMesh.mGeometry.controlPoints, static_cast<std::size_t>(controlPoints),
-         {TnFbxMesh::kDefaultMeshPX, TnFbxMesh::kDefaultMeshPY, TnFbxMesh::kDefaultMeshPZ});
-    mMesh.mGeometry.controlPointCount = controlPoints;
+void MeshArrays::addFirstSet(std::size_t controlPoints) {
+    reserveExactly(mMesh.mGeometry.controlPoints, controlPoints);
+    mMesh.mGeometry.controlPointCount = static_cast<int>(controlPoints);
     mMesh.mGeometry.controlPointSetCount = 1;
 }
 
-std::size_t MeshArrays::polygonVertexCount() const { return mMesh.mGeometry.pointIndices.size(); }
-
-void MeshArrays::complete() {
-    fill(mMesh.mGeometry.normals, polygonVertexCount(),
-         {TnFbxMesh::kDefaultMeshNX, TnFbxMesh::kDefaultMeshNY, TnFbxMesh::kDefaultMeshNZ});
-    fill(mMesh.mGeometry.uvs, polygonVertexCount(), {TnFbxMesh::kDefaultMeshU, TnFbxMesh::kDefaultMeshV});
+void MeshArrays::complete() noexcept {
+    TnFbxMesh::Geometry& g = mMesh.mGeometry;
+    g.polygonVertexSizes.fill(mPolygonCount, 0);
+    g.pointIndices.fill(mCornerCount, 0);
+    g.normals.fill(mCornerCount, {TnFbxMesh::kDefaultMeshNX, TnFbxMesh::kDefaultMeshNY, TnFbxMesh::kDefaultMeshNZ});
+    g.uvs.fill(mCornerCount, {TnFbxMesh::kDefaultMeshU, TnFbxMesh::kDefaultMeshV});
+    g.controlPoints.fill(static_cast<std::size_t>(g.controlPointCount),
+                         {TnFbxMesh::kDefaultMeshPX, TnFbxMesh::kDefaultMeshPY, TnFbxMesh::kDefaultMeshPZ});
     completeColours();
 }
 
-void MeshArrays::completeColours() {
-    fill(mMesh.mGeometry.colours, polygonVertexCount(),
-         {TnFbxMesh::kDefaultMeshRed, TnFbxMesh::kDefaultMeshGreen, TnFbxMesh::kDefaultMeshBlue,
-          TnFbxMesh::kDefaultMeshAlpha});
+void MeshArrays::completeColours() noexcept {
+    mMesh.mGeometry.colours.fill(mCornerCount, {TnFbxMesh::kDefaultMeshRed, TnFbxMesh::kDefaultMeshGreen,
+                                                TnFbxMesh::kDefaultMeshBlue, TnFbxMesh::kDefaultMeshAlpha});
 }
 
 TnFbxMesh::Colour* MeshArrays::colours() {

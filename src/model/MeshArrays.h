@@ -13,8 +13,8 @@
 
 namespace Tarnell::Fbx::detail {
 
-/// Gives a mesh the arrays of TnFbxMesh::allocateGeometryData. The large ones are only reserved at first: each is
-/// sized when it is requested, or else at the end.
+/// Gives a mesh the arrays of TnFbxMesh::allocateGeometryData. Memory for all of them is reserved at first; what is not
+/// added to an array has the default, which takes no memory.
 class MeshArrays {
 public:
     using Vector = TnFbxMesh::Vector;
@@ -46,33 +46,44 @@ public:
     /// of its own.
     void allocateLike(const TnFbxMesh::Geometry& other);
 
-    // Each has its full number of elements, defaults at first.
-    int* polygonVertexSizes() { return mMesh.mGeometry.polygonVertexSizes.own().data(); }
-    int* pointIndices() { return mMesh.mGeometry.pointIndices.own().data(); }
-    const int* polygonVertexSizes() const { return mMesh.mGeometry.polygonVertexSizes.data(); }
-    const int* pointIndices() const { return mMesh.mGeometry.pointIndices.data(); }
-    TnFbxMesh::Colour* colours();
-
-    // For the polygon vertices in order, from the first one on, at most as many as there are. Those that are not added
-    // have the defaults at the end.
-    void addNormal(const TnFbxMesh::Vector& normal) { mMesh.mGeometry.normals.own().push_back(normal); }
-    void addUV(const TnFbxMesh::TextureCoordinate& uv) { mMesh.mGeometry.uvs.own().push_back(uv); }
+    // Each appends to its array: for the polygons, the points and the polygon vertices in order, from the first one on,
+    // at most as many as there are.
+    void addPolygonVertexSize(int size) { polygonVertexSizes().push_back(size); }
+    /// Those that were added, to add more.
+    std::vector<int>& polygonVertexSizes() { return mMesh.mGeometry.polygonVertexSizes.own(); }
+    void addPointIndex(int index) { mMesh.mGeometry.pointIndices.own().push_back(index); }
+    void addPointIndices(const int* indices, std::size_t count) {
+        append(mMesh.mGeometry.pointIndices.own(), indices, count);
+    }
+    void addControlPoint(const Vector& point) { mMesh.mGeometry.controlPoints.own().push_back(point); }
+    void addControlPoints(const Vector* points, std::size_t count) {
+        append(mMesh.mGeometry.controlPoints.own(), points, count);
+    }
+    void addNormal(const Vector& normal) { mMesh.mGeometry.normals.own().push_back(normal); }
     void addNormals(const Vector* normals, std::size_t count) { append(mMesh.mGeometry.normals.own(), normals, count); }
+    void addUV(const TextureCoordinate& uv) { mMesh.mGeometry.uvs.own().push_back(uv); }
     void addUVs(const TextureCoordinate* uvs, std::size_t count) { append(mMesh.mGeometry.uvs.own(), uvs, count); }
 
-    /// Called by the destructor: defaults for everything that was not requested or added.
-    void complete();
+    /// All of them, of which those that are not set have the default.
+    TnFbxMesh::Colour* colours();
+
+    const int* addedPolygonVertexSizes() const { return mMesh.mGeometry.polygonVertexSizes.stored(); }
+    const int* addedPointIndices() const { return mMesh.mGeometry.pointIndices.stored(); }
+
+    /// Called by the destructor: defaults for everything that was not added.
+    void complete() noexcept;
 
 private:
     template <typename Element>
     static void append(std::vector<Element>& array, const Element* elements, std::size_t count) {
         array.insert(array.end(), elements, elements + count);
     }
-    std::size_t polygonVertexCount() const;
-    void addFirstSet(int controlPoints);
-    void completeColours();
+    void addFirstSet(std::size_t controlPoints);
+    void completeColours() noexcept;
 
     TnFbxMesh& mMesh;
+    std::size_t mPolygonCount = 0;
+    std::size_t mCornerCount = 0;
     bool mAllocated = false;
 };
 

@@ -10,7 +10,7 @@ namespace {
 template <class Pool, class Element>
 std::uint64_t shareEqual(Pool& pool, SharedArray<Element>& array) {
     const auto [equal, isNew] = pool.insert(array);
-    if (isNew || equal->data() == array.data()) {
+    if (isNew || equal->identity() == array.identity()) {
         return 0;
     }
     array = *equal;

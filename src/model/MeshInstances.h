@@ -11,6 +11,7 @@
 #include <cstring>
 #include <map>
 #include <set>
+#include <tuple>
 
 namespace Tarnell::Fbx::detail {
 
@@ -48,10 +49,17 @@ private:
     struct Less {
         template <class Element>
         bool operator()(const SharedArray<Element>& left, const SharedArray<Element>& right) const {
-            if (left.size() != right.size()) {
-                return left.size() < right.size();
+            const auto extent = [](const auto& array) {
+                return std::tuple(array.size(), array.storedCount(), array.filler() != nullptr);
+            };
+            if (extent(left) != extent(right)) {
+                return extent(left) < extent(right);
             }
-            return left.size() > 0 && std::memcmp(left.data(), right.data(), left.size() * sizeof(Element)) < 0;
+            const auto order = [](const Element* a, const Element* b, std::size_t count) {
+                return a != nullptr && b != nullptr ? std::memcmp(a, b, count * sizeof(Element)) : 0;
+            };
+            const int elements = order(left.stored(), right.stored(), left.storedCount());
+            return elements != 0 ? elements < 0 : order(left.filler(), right.filler(), 1) < 0;
         }
     };
 

@@ -22,7 +22,7 @@ int lengthOf(const SharedArray<Element>& array) {
 /// The element at an index, null when there is none.
 template <typename Element>
 const Element* elementAt(const SharedArray<Element>& array, int index) {
-    return index >= 0 && index < lengthOf(array) ? array.data() + index : nullptr;
+    return index >= 0 && index < lengthOf(array) ? &array[static_cast<std::size_t>(index)] : nullptr;
 }
 
 template <typename Element>

@@ -22,14 +22,14 @@ public:
     CornerValues(fbxsdk::FbxLayerElement::EMappingMode mapping, const ElementValues<Value>& values)
         : mByControlPoint(mapping == fbxsdk::FbxLayerElement::eByControlPoint), mValues(values) {}
 
-    /// The array that has a value for each of the first `count` corners, in order, where the layout allows that; else
-    /// null.
-    const fbxsdk::FbxLayerElementArrayTemplate<Value>* inOrder(int count) const {
-        return mByControlPoint ? nullptr : mValues.inOrder(count);
-    }
+    /// Whether the first `count` corners have consecutive values.
+    bool areInOrder(int count) const { return !mByControlPoint && mValues.areInOrder(count); }
+    /// Those of consecutive corners.
+    void read(int first, int count, Value* values) const { mValues.read(first, count, values); }
 
-    std::optional<Value> at(const Corner& corner) const {
-        return mValues.at(mByControlPoint ? corner.controlPoint : corner.polygonVertex);
+    /// False when the corner has none; the value is unchanged then.
+    bool read(const Corner& corner, Value& value) const {
+        return mValues.read(mByControlPoint ? corner.controlPoint : corner.polygonVertex, value);
     }
 
 private:

@@ -8,6 +8,7 @@
 #include "PropertySampling.h"
 #include "ReadScope.h"
 #include "access/CornerWarnings.h"
+#include "access/ItemReader.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"
 
@@ -20,6 +21,7 @@
 #include <memory>
 #include <string>
 #include <utility>
+#include <vector>
 
 namespace Tarnell::Fbx {
 
@@ -72,19 +74,33 @@ std::int64_t polygonVertexCount(const fbxsdk::FbxMesh& source) {
     return count;
 }
 
-void fillLayout(const fbxsdk::FbxMesh& source, MeshArrays& arrays) {
+/// Appends the polygons' sizes; returns whether their vertices follow one another in the array, from its beginning on.
+bool fillSizes(const fbxsdk::FbxMesh& source, std::vector<int>& sizes) {
+    const int polygonCount = source.GetPolygonCount();
+    bool areContiguous = true;
+    int end = 0;
+    for (int polygon = 0; polygon < polygonCount; ++polygon) {
+        const int size = source.GetPolygonSize(polygon);
+        areContiguous = areContiguous && source.GetPolygonVertexIndex(polygon) == end;
+        end += size;
+        sizes.push_back(size);
+    }
+    return areContiguous && end <= source.GetPolygonVertexCount();
+}
+
+void fillLayout(const fbxsdk::FbxMesh& source, int cornerCount, MeshArrays& arrays) {
     const int* vertices = source.GetPolygonVertices();
-    int* sizes = arrays.polygonVertexSizes();
-    int* pointIndex = arrays.pointIndices();
+    const bool areContiguous = fillSizes(source, arrays.polygonVertexSizes());
+    if (vertices != nullptr && areContiguous) {
+        arrays.addPointIndices(vertices, static_cast<std::size_t>(cornerCount));
+        return;
+    }
     const int polygonCount = source.GetPolygonCount();
     for (int polygon = 0; polygon < polygonCount; ++polygon) {
         const int size = source.GetPolygonSize(polygon);
         const int start = source.GetPolygonVertexIndex(polygon);
-        *sizes++ = size;
-        if (vertices != nullptr && start >= 0) {
-            pointIndex = std::copy_n(vertices + start, size, pointIndex);
-        } else {
-            pointIndex = std::fill_n(pointIndex, size, -1);
+        for (int i = 0; i < size; ++i) {
+            arrays.addPointIndex(vertices != nullptr && start >= 0 ? vertices[start + i] : -1);
         }
     }
 }
@@ -92,8 +108,8 @@ void fillLayout(const fbxsdk::FbxMesh& source, MeshArrays& arrays) {
 /// Calls `visit(corner)` for every vertex of every polygon, in order. The layout must be filled.
 template <class Visit>
 void forEachCorner(const MeshArrays& arrays, int polygonCount, Visit&& visit) {
-    const int* const sizes = arrays.polygonVertexSizes();
-    const int* const pointIndices = arrays.pointIndices();
+    const int* const sizes = arrays.addedPolygonVertexSizes();
+    const int* const pointIndices = arrays.addedPointIndices();
     int polygonVertex = 0;
     for (int polygon = 0; polygon < polygonCount; ++polygon) {
         for (const int end = polygonVertex + sizes[polygon]; polygonVertex < end; ++polygonVertex) {
@@ -102,47 +118,49 @@ void forEachCorner(const MeshArrays& arrays, int polygonCount, Visit&& visit) {
     }
 }
 
-/// Appends elements to an array in blocks: memory is reserved once per block.
-template <class Element>
-class Block {
-public:
-    bool isFull() const { return mCount == mElements.size(); }
-    void add(const Element& element) { mElements[mCount++] = element; }
-    const Element* data() const { return mElements.data(); }
-    std::size_t takeCount() { return std::exchange(mCount, 0); }
+/// Values on their way to a mesh: as many as stay in the processor's nearest memory.
+constexpr int kBlockSize = 256;
 
-private:
-    std::array<Element, 512> mElements{};
-    std::size_t mCount = 0;
-};
-
-/// Passes on what `convert` makes of each corner's value, or of `missing`; returns whether any corner has a value.
+/// Passes on what `convert` makes of each corner's value, or of `missing`, in blocks; returns whether any corner has a
+/// value.
 template <class Element, class Value, class Convert, class HandOn>
 bool convertCorners(const detail::CornerValues<Value>& stored, const Value& missing, int cornerCount, int polygonCount,
                     MeshArrays& arrays, const Convert& convert, const HandOn& handOn) {
-    Block<Element> block;
-    const auto add = [&](const Value& value) {
-        if (block.isFull()) {
-            handOn(block.data(), block.takeCount());
-        }
-        block.add(convert(value));
+    std::array<Value, kBlockSize> values;
+    std::array<Element, kBlockSize> elements;
+    const auto passOn = [&](int count) {
+        std::transform(values.begin(), values.begin() + count, elements.begin(), convert);
+        handOn(elements.data(), static_cast<std::size_t>(count));
     };
-    bool found = false;
-    if (const auto* const values = stored.inOrder(cornerCount)) { // the case of most files
-        for (int i = 0; i < cornerCount; ++i) {
-            add(values->GetAt(i));
+    if (stored.areInOrder(cornerCount)) { // the case of most normals
+        for (int first = 0; first < cornerCount; first += kBlockSize) {
+            const int count = std::min(kBlockSize, cornerCount - first);
+            stored.read(first, count, values.data());
+            passOn(count);
         }
-        found = cornerCount > 0;
-    } else {
-        forEachCorner(arrays, polygonCount, [&](const Corner& corner) {
-            const std::optional<Value> value = stored.at(corner);
-            found = found || value.has_value();
-            add(value.value_or(missing));
-        });
+        return cornerCount > 0;
     }
-    handOn(block.data(), block.takeCount());
+    bool found = false;
+    int count = 0;
+    forEachCorner(arrays, polygonCount, [&](const Corner& corner) {
+        Value& value = values[static_cast<std::size_t>(count)];
+        if (stored.read(corner, value)) {
+            found = true;
+        } else {
+            value = missing;
+        }
+        if (++count == kBlockSize) {
+            passOn(count);
+            count = 0;
+        }
+    });
+    passOn(count);
     return found;
 }
+
+constexpr auto narrow = [](const fbxsdk::FbxVector4& vector) {
+    return MeshArrays::Vector{toFloat(vector[0]), toFloat(vector[1]), toFloat(vector[2])};
+};
 
 /// The normals of a layer; returns whether it has any.
 bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const fbxsdk::FbxAMatrix* bake,
@@ -150,13 +168,17 @@ bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const f
     const fbxsdk::FbxVector4 missing(static_cast<double>(TnFbxMesh::kDefaultMeshNX),
                                      static_cast<double>(TnFbxMesh::kDefaultMeshNY),
                                      static_cast<double>(TnFbxMesh::kDefaultMeshNZ));
-    const auto convert = [bake](const fbxsdk::FbxVector4& stored) {
-        const fbxsdk::FbxVector4 normal = bake != nullptr ? bake->MultT(stored) : stored;
-        return MeshArrays::Vector{toFloat(normal[0]), toFloat(normal[1]), toFloat(normal[2])};
+    const detail::CornerValues<fbxsdk::FbxVector4> stored = detail::layerNormals(layer);
+    const auto handOn = [&arrays](const MeshArrays::Vector* normals, std::size_t count) {
+        arrays.addNormals(normals, count);
     };
-    return convertCorners<MeshArrays::Vector>(
-        detail::layerNormals(layer), missing, cornerCount, source.GetPolygonCount(), arrays, convert,
-        [&arrays](const MeshArrays::Vector* normals, std::size_t count) { arrays.addNormals(normals, count); });
+    if (bake != nullptr) {
+        const auto baked = [bake](const fbxsdk::FbxVector4& normal) { return narrow(bake->MultT(normal)); };
+        return convertCorners<MeshArrays::Vector>(stored, missing, cornerCount, source.GetPolygonCount(), arrays, baked,
+                                                  handOn);
+    }
+    return convertCorners<MeshArrays::Vector>(stored, missing, cornerCount, source.GetPolygonCount(), arrays, narrow,
+                                              handOn);
 }
 
 /// The texture coordinates of a layer; returns whether it has any.
@@ -202,14 +224,13 @@ bool fillColours(fbxsdk::FbxMesh& source, MeshArrays& arrays) {
 }
 
 /// The values of all layers, in the layout that is filled, too, unless it is that of another node's mesh.
-void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, bool isAlike, MeshArrays& arrays,
-                 TnFbxMesh& mesh) {
+void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, int cornerCount, bool isAlike,
+                 MeshArrays& arrays, TnFbxMesh& mesh) {
     if (!isAlike) {
-        fillLayout(source, arrays);
+        fillLayout(source, cornerCount, arrays);
     }
     bool normals = false, uvs = isAlike && mesh.getValidUVs();
     if (fbxsdk::FbxLayer* first = source.GetLayer(0)) {
-        const int cornerCount = mesh.getNumberOfPolygonVertices();
         normals = fillNormals(source, *first, bake, cornerCount, arrays);
         uvs = isAlike ? uvs : fillUVs(source, *first, cornerCount, arrays);
     }
@@ -258,8 +279,8 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
                                 static_cast<int>(cornerCount))) {
         return fail(std::string("the mesh of \"") + node->GetName() + "\" has no polygons or no points");
     }
-    setControlPoints(time, *node, *source, pointBake, mesh);
-    fillCorners(*source, normalBake, alike != nullptr, arrays, mesh);
+    setControlPoints(time, *node, *source, pointBake, arrays);
+    fillCorners(*source, normalBake, static_cast<int>(cornerCount), alike != nullptr, arrays, mesh);
     if (isInstance) {
         arrays.complete();
         mMemory->giveBack(mInstances->keep(instanced, mesh));
@@ -270,7 +291,7 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
 /// The points at the time's frame, deformed if anything deforms them; a deformer that yields no points leaves them
 /// unset.
 void FbxSdk::setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& source,
-                              const fbxsdk::FbxAMatrix* bake, TnFbxMesh& mesh) {
+                              const fbxsdk::FbxAMatrix* bake, detail::MeshArrays& arrays) {
     std::unique_ptr<fbxsdk::FbxVector4[]> deformed;
     const bool isDeformed = getDeformation(&source);
     if (isDeformed) {
@@ -284,13 +305,23 @@ void FbxSdk::setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::Fb
             return;
         }
     }
+    // In blocks: points that are still in a file need not all be in memory.
     const int count = source.GetControlPointsCount();
-    for (int i = 0; i < count; ++i) {
-        // One by one: points that are still in a file need not all be in memory.
-        const fbxsdk::FbxVector4 stored =
-            isDeformed ? deformed[static_cast<std::size_t>(i)] : source.GetControlPointAt(i);
-        const fbxsdk::FbxVector4 point = bake != nullptr ? bake->MultT(stored) : stored;
-        mesh.setControlPoint(i, toFloat(point[0]), toFloat(point[1]), toFloat(point[2]));
+    std::array<fbxsdk::FbxVector4, kBlockSize> block;
+    std::array<MeshArrays::Vector, kBlockSize> points;
+    for (int first = 0; first < count; first += kBlockSize) {
+        const int size = std::min(kBlockSize, count - first);
+        if (isDeformed) {
+            std::copy_n(&deformed[static_cast<std::size_t>(first)], size, block.begin());
+        } else {
+            detail::readControlPoints(source, first, size, block.data());
+        }
+        if (bake != nullptr) {
+            std::transform(block.begin(), block.begin() + size, block.begin(),
+                           [bake](const fbxsdk::FbxVector4& point) { return bake->MultT(point); });
+        }
+        std::transform(block.begin(), block.begin() + size, points.begin(), narrow);
+        arrays.addControlPoints(points.data(), static_cast<std::size_t>(size));
     }
 }
 

@@ -47,8 +47,9 @@ RULES = (
          "the value classes know neither adapter nor facade"),
     Rule(("include/*.h", "src/*/*.h", "src/*/*.cpp", "src/*.h", "src/*.cpp"), PLATFORM,
          frozenset({"<fbxsdk.h>", "<fbxsdk/Platform.h>"}), "the library sees the platform only as <fbxsdk.h>",
-         # Only the bundled platform has a number of threads: builds against another one omit the include.
-         frozenset({("src/MaximumThreads.cpp", "<fbxsdk/extensions/Threads.h>")})),
+         # Only the bundled platform has extensions: builds against another one omit the includes.
+         frozenset({("src/MaximumThreads.cpp", "<fbxsdk/extensions/Threads.h>"),
+                    ("src/access/ItemReader.h", "<fbxsdk/extensions/ItemRuns.h>")})),
     Rule(("include/Fbx[!P]*.h",), re.compile("<fbxsdk.h>"), frozenset(),
          "where file names ignore case that is FbxSdk.h: public headers include FbxPlatform.h"),
     Rule(("src/access/*.h", "src/access/*.cpp"), EITHER, frozenset(), "what both adapters need knows neither"),

@@ -21,9 +21,15 @@ std::array<float, 9> cornerOf(const TnFbxMesh& mesh, int polygonVertex) {
     return c;
 }
 
+std::array<float, 3> pointOf(const TnFbxMesh& mesh, int index) {
+    std::array<float, 3> p = {-1, -1, -1};
+    EXPECT_TRUE(mesh.getControlPoint(index, p[0], p[1], p[2]));
+    return p;
+}
+
 constexpr std::array<float, 9> kDefaults = {0, 0, 0, 0, 0, 1, 1, 1, 1};
 
-TEST(MeshArrays, HoldsDefaultsInTheEndWhereNobodyAsked) {
+TEST(MeshArrays, HoldsDefaultsForWhatWasNotAdded) {
     TnFbxMesh mesh;
     EXPECT_TRUE(MeshArrays(mesh).allocate(2, 4, 6));
 
@@ -36,13 +42,16 @@ TEST(MeshArrays, HoldsDefaultsInTheEndWhereNobodyAsked) {
     EXPECT_EQ(cornerOf(mesh, 5), kDefaults);
 }
 
-TEST(MeshArrays, KeepsWhatIsWrittenIntoThem) {
+TEST(MeshArrays, KeepsWhatIsAdded) {
     TnFbxMesh mesh;
     {
         MeshArrays arrays(mesh);
-        ASSERT_TRUE(arrays.allocate(1, 1, 3));
-        arrays.polygonVertexSizes()[0] = 3;
-        arrays.pointIndices()[2] = 7;
+        ASSERT_TRUE(arrays.allocate(1, 2, 3));
+        arrays.addPolygonVertexSize(3);
+        arrays.addPointIndex(0);
+        const std::array<int, 2> indices = {6, 7};
+        arrays.addPointIndices(indices.data(), indices.size());
+        arrays.addControlPoint({1, 2, 3});
         arrays.addNormal({0, 0, 0});
         arrays.addNormal({1, 2, 3});
         arrays.addUV({0, 0});
@@ -52,7 +61,10 @@ TEST(MeshArrays, KeepsWhatIsWrittenIntoThem) {
     }
 
     EXPECT_EQ(mesh.getPolygonVertexSize(0), 3);
+    EXPECT_EQ(mesh.getPointIndex(1), 6);
     EXPECT_EQ(mesh.getPointIndex(2), 7);
+    EXPECT_EQ(pointOf(mesh, 0), (std::array<float, 3>{1, 2, 3}));
+    EXPECT_EQ(pointOf(mesh, 1), (std::array<float, 3>{0, 0, 0}));
     EXPECT_EQ(cornerOf(mesh, 1), (std::array<float, 9>{1, 2, 3, 4, 5, 6, 7, 8, 9}));
     EXPECT_EQ(cornerOf(mesh, 2), kDefaults);
 }

@@ -19,9 +19,9 @@ constexpr std::uint64_t kNormalBytes = 12;
 constexpr std::uint64_t kColourBytes = 16;
 
 /// A triangle of three points, which lie at x.
-void fill(MeshArrays& arrays, TnFbxMesh& mesh, float x) {
+void fill(MeshArrays& arrays, float x) {
     for (int i = 0; i < 3; ++i) {
-        mesh.setControlPoint(i, x, 0.0f, 0.0f);
+        arrays.addControlPoint({x, 0.0f, 0.0f});
     }
     arrays.addNormal({0.0f, 1.0f, 0.0f});
 }
@@ -30,8 +30,8 @@ TnFbxMesh triangle(float x) {
     TnFbxMesh mesh;
     MeshArrays arrays(mesh);
     arrays.allocate(1, 3, 3);
-    arrays.polygonVertexSizes()[0] = 3;
-    fill(arrays, mesh, x);
+    arrays.addPolygonVertexSize(3);
+    fill(arrays, x);
     arrays.complete();
     return mesh;
 }
@@ -40,7 +40,7 @@ TnFbxMesh another(const MeshInstances::Geometry& first, float x) {
     TnFbxMesh mesh;
     MeshArrays arrays(mesh);
     arrays.allocateLike(first);
-    fill(arrays, mesh, x);
+    fill(arrays, x);
     arrays.complete();
     return mesh;
 }
@@ -111,6 +111,15 @@ TEST(MeshInstances, OfAnotherSourceOrOrderOfCornersAreUnknown) {
     instances.forget();
     EXPECT_EQ(instances.find(kStraight), nullptr);
     EXPECT_TRUE(instances.isFirst(kStraight));
+}
+
+TEST(MeshInstances, ShareArraysThatHoldDefaultsAlone) {
+    MeshInstances instances;
+    TnFbxMesh first = triangle(5.0f), second = triangle(6.0f);
+    instances.keep(kStraight, first);
+    EXPECT_EQ(instances.keep(kStraight, second), 3 * sizeof(float) * 3 + 3 * sizeof(float) * 4)
+        << "normals and colours";
+    EXPECT_EQ(firstX(second), 6.0f);
 }
 
 } // namespace

@@ -42,6 +42,21 @@ template <>
     return {numbers[0], numbers[1], numbers[2]};
 }
 
+/// Consecutive items of an array as bytes, one after another.
+struct ItemRun {
+    const char* bytes = nullptr; ///< of the first one
+    int first = 0;               ///< the index of the first one
+    int count = 0;
+    std::size_t itemBytes = 0; ///< from one item to the next one
+
+    [[nodiscard]] bool contains(int pIndex) const {
+        return static_cast<unsigned>(pIndex - first) < static_cast<unsigned>(count);
+    }
+    [[nodiscard]] const char* at(int pIndex) const {
+        return bytes + static_cast<std::size_t>(pIndex - first) * itemBytes;
+    }
+};
+
 /// The source of the items of an array until they are in memory. Shown items are accessed through a sliding window.
 ///
 /// Functions that read throw when the file has been changed, and std::bad_alloc. The source is unchanged then.
@@ -65,6 +80,10 @@ public:
     /// The packed bytes of an item in the window, until the window is moved.
     [[nodiscard]] const char* at(int pIndex, std::size_t pItemBytes) const {
         return mWindow + static_cast<std::size_t>(pIndex - mWindowStart) * pItemBytes;
+    }
+    /// The items in the window, until it is moved.
+    [[nodiscard]] ItemRun window(std::size_t pItemBytes) const {
+        return {mWindow, mWindowStart, mWindowSize, pItemBytes};
     }
     /// Moves the window to an item that exists. Items must be shown.
     virtual void moveWindow(int pIndex) = 0;
@@ -142,6 +161,13 @@ public:
     }
     [[nodiscard]] T value(int pIndex) const {
         return source() ? sourceItem(pIndex) : static_cast<const T*>(items())[pIndex];
+    }
+    /// Items around one that exists, for reading several of them: valid until the array is accessed in another way.
+    /// Items of a source have kStoredBytes each.
+    [[nodiscard]] ItemRun run(int pIndex) const {
+        if (source() && (source()->hasInWindow(pIndex) || reach(pIndex)))
+            return source()->window(kStoredBytes<T>);
+        return {static_cast<const char*>(items()), 0, count(), kItemBytes};
     }
     [[nodiscard]] T& operator[](int pIndex) const { return data()[pIndex]; }
     [[nodiscard]] T* begin() const { return data(); }

@@ -4,6 +4,8 @@
 // Control points.
 #include <fbxsdk/FbxGeometryBase.h>
 
+#include <fbxsdk/extensions/ItemRuns.h>
+
 #include "geometry/GeometrySource.h"
 #include "object/ManagerData.h"
 
@@ -52,6 +54,11 @@ void FbxGeometryBase::SetControlPointAt(const FbxVector4& pCtrlPoint, int pIndex
 FbxVector4 FbxGeometryBase::GetControlPointAt(int pIndex) const {
     ensureLoaded();
     return mControlPoints.contains(pIndex) ? mControlPoints.value(pIndex) : FbxVector4();
+}
+
+extensions::ItemRun extensions::controlPointRun(FbxGeometryBase& geometry, int index) {
+    const bool exists = index >= 0 && index < geometry.GetControlPointsCount(); // reads the geometry's source, too
+    return exists ? geometry.points().run(index) : ItemRun{};
 }
 
 FBXSDK_NAMESPACE_END

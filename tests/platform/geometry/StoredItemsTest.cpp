@@ -105,6 +105,45 @@ TEST(StoredItems, AreGivenUpAlsoWhenTheyAreFew) {
     }
 }
 
+TEST(StoredItems, AreReadInRuns) {
+    Calls calls;
+    PlainArray<int> array;
+    keep(array, upTo(kMany), calls);
+
+    for (int i = 0; i < kMany;) {
+        const ItemRun run = array.run(i);
+        ASSERT_TRUE(run.contains(i));
+        ASSERT_EQ(run.itemBytes, sizeof(int));
+        for (; run.contains(i); ++i) {
+            int item = -1;
+            std::memcpy(&item, run.at(i), sizeof item);
+            ASSERT_EQ(item, i);
+        }
+    }
+
+    EXPECT_GT(calls.spoiled, kManyBytes / 8 * 7);
+    EXPECT_EQ(calls.restored, 0);
+}
+
+TEST(StoredItems, AreOneRunWhenTheyAreInMemory) {
+    Calls calls;
+    PlainArray<FbxVector4> array;
+    keep(array, std::vector<double>{1, 2, 3, 4, 5, 6}, calls);
+    EXPECT_EQ(array.run(1).itemBytes, 3 * sizeof(double)) << "in the file";
+
+    array[0] = FbxVector4(7, 8, 9, 10);
+
+    const ItemRun run = array.run(1);
+    EXPECT_EQ(run.first, 0);
+    EXPECT_EQ(run.count, 2);
+    EXPECT_EQ(run.itemBytes, sizeof(FbxVector4));
+    EXPECT_FALSE(run.contains(2));
+    EXPECT_FALSE(run.contains(-1));
+    double w = 0.0;
+    std::memcpy(&w, run.at(0) + 3 * sizeof(double), sizeof w);
+    EXPECT_EQ(w, 10.0);
+}
+
 TEST(StoredItems, ComeAgainForAReaderWhoStartsOver) {
     Calls calls;
     PlainArray<int> array;
