@@ -40,6 +40,16 @@ public:
         ++mCount;
     }
 
+    /// As many values.
+    void add(const float* values, std::size_t count) {
+        std::size_t done = 0;
+        while (done < count && mValues.empty()) {
+            add(values[done++]);
+        }
+        mValues.insert(mValues.end(), values + done, values + count);
+        mCount += count - done;
+    }
+
     /// The value at all frames.
     void setConstant(float value) {
         mValues.clear();

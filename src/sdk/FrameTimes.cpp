@@ -19,14 +19,10 @@ void detail::FrameTimes::begin(std::int64_t firstFrame, float rate) {
     mRate = rate;
 }
 
-fbxsdk::FbxTime detail::FrameTimes::at(std::int64_t frame) {
-    const auto index = static_cast<std::size_t>(frame - mFirstFrame);
-    if (index < mTimes.size()) {
-        return mTimes[index];
-    }
+fbxsdk::FbxTime detail::FrameTimes::timeOf(std::int64_t frame) {
     fbxsdk::FbxTime time;
     time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(mRate));
-    if (index < kMostKeptTimes) {
+    if (mTimes.size() < kMostKeptTimes) {
         mTimes.push_back(time);
     }
     return time;

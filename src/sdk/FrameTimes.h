@@ -6,6 +6,7 @@
 
 #include <fbxsdk.h>
 
+#include <cstddef>
 #include <cstdint>
 #include <vector>
 
@@ -17,9 +18,14 @@ public:
     /// For a channel that starts at this frame, at that many frames per second.
     void begin(std::int64_t firstFrame, float rate);
     /// Frames are requested in order, from the first one on.
-    fbxsdk::FbxTime at(std::int64_t frame);
+    fbxsdk::FbxTime at(std::int64_t frame) {
+        const auto index = static_cast<std::size_t>(frame - mFirstFrame);
+        return index < mTimes.size() ? mTimes[index] : timeOf(frame);
+    }
 
 private:
+    fbxsdk::FbxTime timeOf(std::int64_t frame);
+
     std::int64_t mFirstFrame = 0;
     float mRate = 0.0f;
     std::vector<fbxsdk::FbxTime> mTimes; // of the first frames

@@ -99,9 +99,11 @@ struct GlobalSampler::MovingNode {
     MovingNode(FbxSdk& sdk, fbxsdk::FbxNode& sampled, const fbxsdk::FbxAMatrix& offset)
         : node(sampled), isTurned(shinesAlongAnAxis(sampled)), geometric(offset), decomposition(sdk) {}
 
-    const Placement& at(const fbxsdk::FbxTime& moment) {
+    const Placement& at(const fbxsdk::FbxTime& moment) { return of(globalTransform(node, moment)); }
+
+    /// The placement that the node's global matrix gives.
+    const Placement& of(const fbxsdk::FbxAMatrix& matrix) {
         static const fbxsdk::FbxAMatrix turn = lightAxisTurn();
-        const fbxsdk::FbxAMatrix matrix = globalTransform(node, moment);
         return decomposition.of(isTurned ? matrix * turn * geometric : matrix * geometric);
     }
 
@@ -164,19 +166,33 @@ bool GlobalSampler::begin(MovingNode& node, SampleAccount& account) const {
     return false;
 }
 
+/// Adds a sample; returns whether there is memory for it.
+bool GlobalSampler::add(MovingNode& node, const fbxsdk::FbxAMatrix& matrix, SampleAccount& account) const {
+    const Placement& placement = node.of(matrix);
+    for (std::size_t i = 0; i < placement.size(); ++i) {
+        SampleRun& run = node.runs[i];
+        // The memory of the first channel that changes is reserved already.
+        if (run.spreadsWith(placement[i]) && node.spreadCount++ > 0 &&
+            !account.take(mFrames, mRate, /*channelCount*/ 1)) {
+            account.take(mFrames, mRate, placement.size() - node.spreadCount);
+            return false;
+        }
+        run.add(placement[i]);
+    }
+    return true;
+}
+
 /// Continues by some frames; returns whether there is memory for more.
-bool GlobalSampler::goOn(MovingNode& node, const std::vector<fbxsdk::FbxTime>& times, SampleAccount& account) const {
-    for (const fbxsdk::FbxTime& time : times) {
-        const Placement& placement = node.at(time);
-        for (std::size_t i = 0; i < placement.size(); ++i) {
-            SampleRun& run = node.runs[i];
-            // The memory of the first channel that changes is reserved already.
-            if (run.spreadsWith(placement[i]) && node.spreadCount++ > 0 &&
-                !account.take(mFrames, mRate, /*channelCount*/ 1)) {
-                account.take(mFrames, mRate, placement.size() - node.spreadCount);
+bool GlobalSampler::goOn(MovingNode& node, std::span<const fbxsdk::FbxTime> times, SampleAccount& account) const {
+    std::array<fbxsdk::FbxAMatrix, 64> matrices;
+    while (!times.empty()) {
+        const std::size_t count = std::min(matrices.size(), times.size());
+        globalTransforms(node.node, times.first(count), matrices.data());
+        times = times.subspan(count);
+        for (std::size_t i = 0; i < count; ++i) {
+            if (!add(node, matrices[i], account)) {
                 return false;
             }
-            run.add(placement[i]);
         }
     }
     return true;

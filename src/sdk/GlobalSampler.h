@@ -15,6 +15,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <span>
 #include <unordered_map>
 #include <vector>
 
@@ -61,7 +62,8 @@ private:
     Ancestry ancestryOf(const fbxsdk::FbxNode& node);
     fbxsdk::FbxTime timeOf(std::int64_t frame) const;
     bool begin(MovingNode& node, SampleAccount& account) const;
-    bool goOn(MovingNode& node, const std::vector<fbxsdk::FbxTime>& times, SampleAccount& account) const;
+    bool goOn(MovingNode& node, std::span<const fbxsdk::FbxTime> times, SampleAccount& account) const;
+    bool add(MovingNode& node, const fbxsdk::FbxAMatrix& matrix, SampleAccount& account) const;
 
     FbxSdk& mSdk;
     SampleRange mFrames;

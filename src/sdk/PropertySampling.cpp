@@ -7,7 +7,14 @@
 #include "FbxSdk.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
+#include <functional>
+#include <span>
+
+#ifndef TARNELL_FBX_EXTERNAL_FBXSDK
+#include <fbxsdk/extensions/CurveSamples.h>
+#endif
 
 namespace Tarnell::Fbx {
 
@@ -45,6 +52,17 @@ bool isLevel(const fbxsdk::FbxAnimCurve& curve) {
     return true;
 }
 
+/// The curve's values at the times; another platform than ours is asked for each.
+void evaluateEach(fbxsdk::FbxAnimCurve& curve, std::span<const fbxsdk::FbxTime> times, float* values) {
+#ifdef TARNELL_FBX_EXTERNAL_FBXSDK
+    int lastKey = 0; // the next sample is close to it
+    std::transform(times.begin(), times.end(), values,
+                   [&](const fbxsdk::FbxTime& time) { return curve.Evaluate(time, &lastKey); });
+#else
+    fbxsdk::extensions::evaluate(curve, times.data(), static_cast<int>(times.size()), values);
+#endif
+}
+
 } // namespace
 
 std::vector<fbxsdk::FbxAnimLayer*> detail::layersOf(fbxsdk::FbxAnimStack* stack) {
@@ -76,14 +94,14 @@ void PropertySampler::collectCurves(const fbxsdk::FbxProperty& property, const c
     const fbxsdk::FbxString name = property.GetName();
     for (fbxsdk::FbxAnimLayer* layer : mLayers) {
         if (fbxsdk::FbxAnimCurve* curve = animated.GetCurve(layer, name, component, /*pCreate*/ false)) {
-            mCurves.push_back({curve, 0});
+            mCurves.push_back(curve);
         }
     }
 }
 
 detail::SampleRange PropertySampler::keyedRange() const {
     SampleRange range;
-    for (const auto& [curve, lastKey] : mCurves) {
+    for (const fbxsdk::FbxAnimCurve* curve : mCurves) {
         const int keyCount = curve->KeyGetCount();
         if (keyCount < 1) {
             continue;
@@ -99,17 +117,17 @@ detail::SampleRange PropertySampler::keyedRange() const {
     return range;
 }
 
-float PropertySampler::valueAt(const fbxsdk::FbxTime& moment) {
+float PropertySampler::valueAt(const fbxsdk::FbxTime& moment) const {
     float value = 0.0f;
-    for (auto& [curve, lastKey] : mCurves) {
-        value += curve->Evaluate(moment, &lastKey);
+    for (fbxsdk::FbxAnimCurve* curve : mCurves) {
+        value += curve->Evaluate(moment);
     }
     return value;
 }
 
 bool PropertySampler::isConstant() const {
     return std::all_of(mCurves.begin(), mCurves.end(),
-                       [](const SampledCurve& sampled) { return isLevel(*sampled.curve); });
+                       [](const fbxsdk::FbxAnimCurve* curve) { return isLevel(*curve); });
 }
 
 /// The samples of a range that fits an `int`; false when there is not enough memory for them.
@@ -124,8 +142,20 @@ bool PropertySampler::sampleFrames(const SampleRange& range) {
     if (!mAccount.take(range, mRate, /*channelCount*/ 1)) {
         return false;
     }
-    for (std::int64_t i = 0; i < count; ++i) {
-        mSamples.add(valueAt(mFrameTimes.at(range.first + i)));
+    constexpr std::int64_t kBlockSize = 256;
+    std::array<fbxsdk::FbxTime, kBlockSize> times;
+    std::array<float, kBlockSize> sums, values;
+    for (std::int64_t done = 0; done < count; done += kBlockSize) {
+        const auto size = static_cast<std::size_t>(std::min(kBlockSize, count - done));
+        for (std::size_t i = 0; i < size; ++i) {
+            times[i] = mFrameTimes.at(range.first + done + static_cast<std::int64_t>(i));
+        }
+        sums.fill(0.0f);
+        for (fbxsdk::FbxAnimCurve* curve : mCurves) {
+            evaluateEach(*curve, std::span(times).first(size), values.data());
+            std::transform(sums.begin(), sums.begin() + size, values.begin(), sums.begin(), std::plus<>());
+        }
+        mSamples.add(sums.data(), size);
     }
     if (mSamples.isOneValue()) {
         mAccount.giveBack(range);

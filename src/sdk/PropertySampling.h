@@ -114,7 +114,7 @@ private:
 
     void collectCurves(const fbxsdk::FbxProperty& property, const char* component);
     SampleRange keyedRange() const;
-    float valueAt(const fbxsdk::FbxTime& moment);
+    float valueAt(const fbxsdk::FbxTime& moment) const;
     bool isConstant() const;
     bool sampleFrames(const SampleRange& range);
 
@@ -127,13 +127,7 @@ private:
     SampleAccount& mAccount;
     FrameTimes& mFrameTimes;
 
-    /// A curve, and a cursor at its last evaluation: the next sample is close to it.
-    struct SampledCurve {
-        fbxsdk::FbxAnimCurve* curve;
-        int lastKey;
-    };
-
-    std::vector<SampledCurve> mCurves; // of the component being sampled, with and without keys
+    std::vector<fbxsdk::FbxAnimCurve*> mCurves; // of the component being sampled, with and without keys
     TnFbxTime mTime;
     SampleRun mSamples;
 };

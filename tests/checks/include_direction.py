@@ -49,7 +49,9 @@ RULES = (
          frozenset({"<fbxsdk.h>", "<fbxsdk/Platform.h>"}), "the library sees the platform only as <fbxsdk.h>",
          # Only the bundled platform has extensions: builds against another one omit the includes.
          frozenset({("src/MaximumThreads.cpp", "<fbxsdk/extensions/Threads.h>"),
-                    ("src/access/ItemReader.h", "<fbxsdk/extensions/ItemRuns.h>")})),
+                    ("src/access/ItemReader.h", "<fbxsdk/extensions/ItemRuns.h>"),
+                    ("src/sdk/NodeGeometry.h", "<fbxsdk/extensions/NodeSamples.h>"),
+                    ("src/sdk/PropertySampling.cpp", "<fbxsdk/extensions/CurveSamples.h>")})),
     Rule(("include/Fbx[!P]*.h",), re.compile("<fbxsdk.h>"), frozenset(),
          "where file names ignore case that is FbxSdk.h: public headers include FbxPlatform.h"),
     Rule(("src/access/*.h", "src/access/*.cpp"), EITHER, frozenset(), "what both adapters need knows neither"),

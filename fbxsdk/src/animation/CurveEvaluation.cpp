@@ -19,12 +19,12 @@ namespace {
 double valueOf(const CurveKeys& keys, std::size_t key) { return static_cast<double>(keys.values[key]); }
 
 /// Rounds to single precision; a value out of range becomes the largest float.
-float toFloat(double value) {
+inline float toFloat(double value) {
     constexpr double kLargest = static_cast<double>(std::numeric_limits<float>::max());
     return static_cast<float>(std::isfinite(value) ? std::clamp(value, -kLargest, kLargest) : value);
 }
 
-double bezier(double p0, double p1, double p2, double p3, double u) {
+inline double bezier(double p0, double p1, double p2, double p3, double u) {
     const double v = 1.0 - u;
     return v * v * v * p0 + 3.0 * v * v * u * p1 + 3.0 * v * u * u * p2 + u * u * u * p3;
 }
@@ -67,7 +67,7 @@ CubicSegment cubicSegment(const CurveKeys& keys, std::size_t key) {
     return segment;
 }
 
-double cubicValue(const CubicSegment& segment, double passed) {
+inline double cubicValue(const CubicSegment& segment, double passed) {
     const double part = passed / segment.ticks;
     const bool plain = segment.right == kEqualWeight && segment.left == kEqualWeight;
     const auto& [start, startHandle, endHandle, end] = segment.values;
@@ -231,6 +231,30 @@ float evaluate(const CurveKeys& keys, std::int64_t ticks, CurveCursor* cursor) {
         return toFloat(extrapolatedValue(keys, ticks, Side::after, used));
     }
     return toFloat(valueWithin(keys, ticks, used));
+}
+
+void evaluate(const CurveKeys& keys, const FbxTime* times, int count, float* values) {
+    CurveCursor cursor;
+    for (int i = 0; i < count; ++i) {
+        values[i] = evaluate(keys, times[i].Get(), &cursor);
+        const std::size_t key = cursor.segment;
+        if (key != cursor.cubic.key || key + 1 >= keys.keyCount()) {
+            continue;
+        }
+        // The following times in the same cubic segment, most of the samples, and at the key at its end.
+        const CubicSegment cubic = cursor.cubic;
+        const std::int64_t start = keys.times[key];
+        const std::int64_t end = keys.times[key + 1];
+        for (; i + 1 < count && start < times[i + 1].Get() && times[i + 1].Get() < end; ++i) {
+            values[i + 1] = toFloat(cubicValue(cubic, static_cast<double>(ticksBetween(start, times[i + 1].Get()))));
+        }
+        const bool isOnlyKeyThere = key + 2 == keys.keyCount() || end < keys.times[key + 2];
+        if (i + 1 < count && times[i + 1].Get() == end && isOnlyKeyThere) {
+            ++i;
+            values[i] = toFloat(valueOf(keys, key + 1));
+            cursor.segment = key + 1;
+        }
+    }
 }
 
 } // namespace detail

@@ -8,6 +8,8 @@
 #include <cstddef>
 #include <cstdint>
 
+#include <fbxsdk/FbxTime.h>
+
 #include "document/CurveKeys.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -34,6 +36,9 @@ struct CurveCursor {
 /// The value at a time. Any times, values and attributes give a value (NaN only where keys are NaN or infinite), also
 /// unsorted times, though no meaningful one. The cursor makes it faster and has no other effect.
 [[nodiscard]] float evaluate(const CurveKeys& keys, std::int64_t ticks, CurveCursor* cursor = nullptr);
+
+/// The values at many times, each the same as `evaluate` gives.
+void evaluate(const CurveKeys& keys, const FbxTime* times, int count, float* values);
 
 /// The slope, per second, with which the curve leaves a key to the right, by its interpolation. The last key of
 /// a curve has the tangent it would have if the curve continued. The key must exist.

@@ -8,6 +8,7 @@
 #include <cmath>
 
 #include <fbxsdk/FbxAnimCurveNode.h>
+#include <fbxsdk/extensions/CurveSamples.h>
 
 #include "animation/CurveEvaluation.h"
 #include "document/Document.h"
@@ -190,6 +191,13 @@ float FbxAnimCurve::Evaluate(FbxTime pTime, int* pLast) {
     if (pLast)
         *pLast = static_cast<int>(cursor.segment);
     return value;
+}
+
+void extensions::evaluate(FbxAnimCurve& curve, const FbxTime* times, int count, float* values) {
+    if (curve.keys().keyCount() == 0)
+        std::fill_n(values, std::max(count, 0), curve.GetValue(0));
+    else
+        detail::evaluate(curve.keys(), times, count, values);
 }
 
 namespace {

@@ -13,6 +13,7 @@
 #include <fbxsdk/FbxAnimCurveNode.h>
 #include <fbxsdk/FbxAnimLayer.h>
 #include <fbxsdk/FbxAnimStack.h>
+#include <fbxsdk/extensions/CurveSamples.h>
 
 #include "core/Rotation.h"
 #include "object/SceneMembers.h"
@@ -42,14 +43,21 @@ LayerContribution contributionOf(FbxAnimLayer& layer, const FbxAnimCurveNode& cu
     return contribution;
 }
 
-/// The layer's value for each component: its curve's, or the channel's where it has none.
-Components layerValue(LayerContribution& contribution, const FbxTime& time) {
-    Components value = contribution.values;
-    for (std::size_t i = 0; i < value.size(); ++i) {
-        if (FbxAnimCurve* curve = contribution.curves[i])
-            value[i] = static_cast<double>(curve->Evaluate(time, &contribution.hints[i]));
+/// The layer's values for each component: those of its curve, or the channel's where it has none.
+void layerValues(LayerContribution& contribution, const FbxTime* times, int count, Components* values) {
+    std::fill_n(values, count, contribution.values);
+    for (std::size_t i = 0; i < contribution.curves.size(); ++i) {
+        FbxAnimCurve* curve = contribution.curves[i];
+        if (!curve)
+            continue;
+        std::array<float, kMostTimes> samples;
+        if (count == 1)
+            samples[0] = curve->Evaluate(*times, &contribution.hints[i]);
+        else
+            extensions::evaluate(*curve, times, count, samples.data());
+        for (int j = 0; j < count; ++j)
+            values[j][i] = static_cast<double>(samples[static_cast<std::size_t>(j)]);
     }
-    return value;
 }
 
 double weightOf(FbxAnimLayer& layer, const FbxTime& time) {
@@ -157,15 +165,21 @@ AnimatedProperty bindAnimation(const FbxProperty& property, FbxAnimStack* stack)
     return animation;
 }
 
-Components evaluateAnimation(AnimatedProperty& animation, const FbxTime& time, FbxEuler::EOrder rotationOrder) {
-    Components value = animation.staticValue;
+void evaluateAnimation(AnimatedProperty& animation, const FbxTime* times, int count, FbxEuler::EOrder rotationOrder,
+                       Components* values) {
+    std::fill_n(values, count, animation.staticValue);
     for (LayerContribution& contribution : animation.contributions) {
-        const Components layer = layerValue(contribution, time);
-        value = contribution.base ? layer
-                                  : combine(value, layer, *contribution.layer, weightOf(*contribution.layer, time),
-                                            animation, rotationOrder);
+        if (contribution.base) {
+            layerValues(contribution, times, count, values);
+            continue;
+        }
+        std::array<Components, kMostTimes> layer;
+        layerValues(contribution, times, count, layer.data());
+        for (int i = 0; i < count; ++i) {
+            values[i] = combine(values[i], layer[static_cast<std::size_t>(i)], *contribution.layer,
+                                weightOf(*contribution.layer, times[i]), animation, rotationOrder);
+        }
     }
-    return value;
 }
 
 } // namespace detail

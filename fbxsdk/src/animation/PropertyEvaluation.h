@@ -44,8 +44,19 @@ struct AnimatedProperty {
 /// stack is solo all that are not. A null stack gives the static value.
 AnimatedProperty bindAnimation(const FbxProperty& property, FbxAnimStack* stack);
 
-/// The value at the time. The rotation order matters to layers that compose rotations.
-Components evaluateAnimation(AnimatedProperty& animation, const FbxTime& time, FbxEuler::EOrder rotationOrder);
+/// How many times are evaluated together at most.
+constexpr int kMostTimes = 64;
+
+/// The values at some times, at most kMostTimes. The rotation order matters to layers that compose rotations.
+void evaluateAnimation(AnimatedProperty& animation, const FbxTime* times, int count, FbxEuler::EOrder rotationOrder,
+                       Components* values);
+/// The value at one time.
+[[nodiscard]] inline Components evaluateAnimation(AnimatedProperty& animation, const FbxTime& time,
+                                                  FbxEuler::EOrder rotationOrder) {
+    Components value;
+    evaluateAnimation(animation, &time, 1, rotationOrder, &value);
+    return value;
+}
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -55,20 +55,20 @@ constexpr double kSmallestLength = DBL_MIN;
 /// Two unit axes whose cross product is shorter are parallel.
 constexpr double kParallel = 1.0e-12;
 
-double dot(const Vector3& a, const Vector3& b) { return a[0] * b[0] + a[1] * b[1] + a[2] * b[2]; }
+inline double dot(const Vector3& a, const Vector3& b) { return a[0] * b[0] + a[1] * b[1] + a[2] * b[2]; }
 
-Vector3 cross(const Vector3& a, const Vector3& b) {
+inline Vector3 cross(const Vector3& a, const Vector3& b) {
     return {a[1] * b[2] - a[2] * b[1], a[2] * b[0] - a[0] * b[2], a[0] * b[1] - a[1] * b[0]};
 }
 
-double length(const Vector3& v) {
+inline double length(const Vector3& v) {
     const double square = dot(v, v);
     // the plain sum is exact enough as long as the squares stay within the range of doubles
     const bool safe = square > 1.0e-280 && square < 1.0e280;
     return safe ? std::sqrt(square) : std::hypot(v[0], v[1], v[2]);
 }
 
-Vector3 divided(const Vector3& v, double divisor) { return {v[0] / divisor, v[1] / divisor, v[2] / divisor}; }
+inline Vector3 divided(const Vector3& v, double divisor) { return {v[0] / divisor, v[1] / divisor, v[2] / divisor}; }
 
 Vector3 coordinateAxis(size_t i) { return {i == 0 ? 1.0 : 0.0, i == 1 ? 1.0 : 0.0, i == 2 ? 1.0 : 0.0}; }
 

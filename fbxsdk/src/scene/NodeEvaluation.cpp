@@ -15,6 +15,7 @@
 #include <fbxsdk/FbxAnimStack.h>
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
+#include <fbxsdk/extensions/NodeSamples.h>
 
 #include "animation/PropertyEvaluation.h"
 #include "core/Rotation.h"
@@ -176,18 +177,40 @@ NodeEvaluation& currentState(FbxNode& node) {
 // ---- Evaluation ----
 
 /// Of a property that is no rotation.
-Components valueAt(AnimatedProperty& property, const FbxTime& time) {
-    return property.animated() ? evaluateAnimation(property, time, FbxEuler::eOrderXYZ) : property.staticValue;
+void valuesAt(AnimatedProperty& property, const FbxTime* times, int count, Components* values) {
+    if (property.animated())
+        evaluateAnimation(property, times, count, FbxEuler::eOrderXYZ, values);
+    else
+        std::fill_n(values, count, property.staticValue);
+}
+
+/// At some times, at most kMostTimes.
+void localsAt(NodeEvaluation& state, const FbxTime* times, int count, LocalTransform* locals) {
+    if (!state.animation) {
+        std::fill_n(locals, count, state.still);
+        return;
+    }
+    TransformBinding& binding = *state.animation;
+    std::array<Components, kMostTimes> translations, rotations, scalings;
+    valuesAt(binding.translation, times, count, translations.data());
+    valuesAt(binding.scaling, times, count, scalings.data());
+    if (binding.rotation.animated())
+        evaluateAnimation(binding.rotation, times, count, binding.order, rotations.data());
+    for (int i = 0; i < count; ++i) {
+        const auto at = static_cast<std::size_t>(i);
+        const bool isStill = times[i] == FBXSDK_TIME_INFINITE;
+        const Linear& turn =
+            binding.rotation.animated() && !isStill ? turnOf(binding, rotations[at]) : state.still.rotation;
+        locals[i] = isStill ? state.still : localOf(binding, translations[at], turn, scalings[at]);
+    }
 }
 
 LocalTransform localAt(NodeEvaluation& state, const FbxTime& time) {
     if (!state.animation || time == FBXSDK_TIME_INFINITE)
         return state.still;
-    TransformBinding& binding = *state.animation;
-    const Linear turn = binding.rotation.animated()
-                            ? turnOf(binding, evaluateAnimation(binding.rotation, time, binding.order))
-                            : state.still.rotation;
-    return localOf(binding, valueAt(binding.translation, time), turn, valueAt(binding.scaling, time));
+    LocalTransform local;
+    localsAt(state, &time, 1, &local);
+    return local;
 }
 
 /// The linear part of a global matrix; the three inherit types differ in where the parent's scale enters. A node that
@@ -276,6 +299,27 @@ GlobalTransform globalAt(FbxNode& node, const FbxTime& time) {
         }
     }
     return path.empty() ? *known : transform;
+}
+
+/// At some times, at most kMostTimes, in any order. The node or one above it is animated.
+void globalsAt(FbxNode& node, NodeEvaluation& state, const FbxTime* times, int count, FbxAMatrix* matrices) {
+    EvaluationBudget& budget = evaluationBudgetOf(node.GetFbxManager()->data());
+    FbxNode* parent = node.GetParent();
+    std::array<LocalTransform, kMostTimes> locals;
+    localsAt(state, times, count, locals.data());
+    for (int i = 0; i < count; ++i) {
+        const std::uint64_t number = budget.times.numberOf(times[i].Get());
+        const GlobalTransform* above = parent ? knownTransform(parent->evaluation(), budget, number) : nullptr;
+        GlobalTransform evaluated;
+        if (parent && !above) {
+            evaluated = globalAt(*parent, times[i]);
+            above = &evaluated;
+        }
+        const GlobalTransform global = combine(above, locals[static_cast<std::size_t>(i)], state.inherit);
+        if (node.GetChildCount() > 0)
+            budget.store(state, number, global);
+        write(matrices[i], global.matrix, global.translation);
+    }
 }
 
 } // namespace
@@ -395,6 +439,17 @@ FbxAMatrix& FbxNode::EvaluateGlobalTransform(FbxTime pTime, FbxNode::EPivotSet, 
     FbxAMatrix& global = evaluation().global;
     detail::evaluateGlobal(*this, pTime, global);
     return global;
+}
+
+void extensions::evaluateGlobalTransforms(FbxNode& node, const FbxTime* times, int count, FbxAMatrix* matrices) {
+    detail::NodeEvaluation& state = detail::stateWithChain(node);
+    if (state.chain == detail::NodeEvaluation::Chain::isStatic) {
+        if (count > 0)
+            std::fill_n(matrices, count, node.EvaluateGlobalTransform(times[0]));
+        return;
+    }
+    for (int done = 0; done < count; done += detail::kMostTimes)
+        detail::globalsAt(node, state, times + done, std::min(detail::kMostTimes, count - done), matrices + done);
 }
 
 FbxAMatrix& FbxNode::EvaluateLocalTransform(FbxTime pTime, FbxNode::EPivotSet, bool, bool) {

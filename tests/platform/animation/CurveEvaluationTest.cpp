@@ -2,7 +2,9 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // Curves against closed forms, against numbers of real files, and with invalid keys.
+#include <algorithm>
 #include <cmath>
+#include <cstring>
 #include <limits>
 #include <random>
 #include <vector>
@@ -351,6 +353,48 @@ TEST(CurveEvaluation, GivesTheSameInAnyOrderOfSampling) {
         cursor.segment = wrong;
         EXPECT_EQ(detail::evaluate(curve, ticks(3.1), &cursor), at(curve, 3.1));
     }
+}
+
+std::vector<FbxTime> timesOf(int first, int last, double rate) {
+    std::vector<FbxTime> times;
+    for (int frame = first; frame < last; ++frame) {
+        times.emplace_back(ticks(frame / rate));
+    }
+    return times;
+}
+
+void expectSameTogether(const CurveKeys& curve, const std::vector<FbxTime>& times, const char* what) {
+    std::vector<float> values(times.size());
+    detail::evaluate(curve, times.data(), static_cast<int>(times.size()), values.data());
+    for (std::size_t i = 0; i < times.size(); ++i) {
+        const float alone = detail::evaluate(curve, times[i].Get());
+        ASSERT_EQ(std::memcmp(&values[i], &alone, sizeof alone), 0)
+            << what << ' ' << i << ": " << values[i] << ' ' << alone;
+    }
+}
+
+TEST(CurveEvaluation, GivesTheSameBitsForManyTimesTogether) {
+    std::mt19937_64 random(17);
+    std::uniform_real_distribution<float> value(-10.0F, 10.0F);
+    const std::uint32_t kinds[] = {kConstant, kConstantNext, kLinear, kUser, kAuto, kTcb, kUser | kWeighted};
+    for (int round = 0; round < 100; ++round) {
+        const Extrapolation before = {static_cast<ExtrapolationType>(1 + round % 5), round % 4 - 1};
+        const Extrapolation after = {static_cast<ExtrapolationType>(1 + round / 5 % 5), round / 3 % 4 - 1};
+        std::vector<Key> keys;
+        double time = 0.0;
+        for (int i = 0; i < 1 + round % 30; ++i) {
+            time += static_cast<double>(random() % 4) * (round % 2 == 0 ? 5.0 / 24.0 : 0.1); // also several at one time
+            keys.push_back({time, value(random), kinds[random() % std::size(kinds)], value(random), value(random)});
+        }
+        const CurveKeys curve = curveOf(keys, before, after);
+        expectSameTogether(curve, timesOf(-100, 1000, 24.0), "in order");
+        std::vector<FbxTime> mixed = timesOf(-50, 500, 30.0);
+        std::shuffle(mixed.begin(), mixed.end(), random);
+        mixed.insert(mixed.end(), {FBXSDK_TIME_INFINITE, FBXSDK_TIME_MINUS_INFINITE, mixed.front(), mixed.front()});
+        expectSameTogether(curve, mixed, "in any order");
+    }
+    expectSameTogether({}, timesOf(0, 3, 24.0), "without keys");
+    expectSameTogether({}, {}, "without times");
 }
 
 TEST(CurveEvaluation, LetsTheLastOfSeveralKeysAtOneTimeCount) {

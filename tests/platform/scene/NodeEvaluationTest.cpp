@@ -5,11 +5,13 @@
 // matrices.
 #include <cmath>
 #include <cstddef>
+#include <cstring>
 #include <limits>
 #include <string>
 #include <vector>
 
 #include <fbxsdk/FbxNode.h>
+#include <fbxsdk/extensions/NodeSamples.h>
 
 #include "Animate.h"
 #include "NodeEvaluationFixture.h"
@@ -416,6 +418,59 @@ TEST_F(NodeEvaluationTest, GivesTheSameInAnyOrderOfTimesAndNodes) {
         const auto node = static_cast<std::size_t>(random.whole(5));
         EXPECT_EQ(plain::difference(evaluate(node, frame), first[static_cast<std::size_t>(frame) * 5 + node]), 0.0);
     }
+}
+
+TEST_F(NodeEvaluationTest, GivesTheSameBitsForManyTimesTogether) {
+    FbxAnimLayer* base = addStack(*scene);
+    FbxAnimLayer* additive = addLayer(*base->GetScene()->GetCurrentAnimationStack());
+    SeededRandom random(23);
+    std::vector<FbxNode*> nodes = {scene->GetRootNode()};
+    for (int i = 0; i < 60; ++i) {
+        FbxNode* node = addNode("n", nodes[static_cast<std::size_t>(random.whole(static_cast<int>(nodes.size())))]);
+        node->LclTranslation.Set(random.triple(-10, 10));
+        node->LclScaling.Set(random.triple(0.5, 2));
+        node->SetTransformationInheritType(static_cast<FbxTransform::EInheritType>(random.whole(3)));
+        if (random.chance(2)) {
+            node->SetRotationActive(true);
+            node->SetRotationOrder(kSet, kOrders[random.whole(6)].order);
+            node->SetPreRotation(kSet, random.vector(-90, 90));
+            node->SetRotationPivot(kSet, random.vector(-5, 5));
+        }
+        if (!random.chance(3)) {
+            for (FbxAnimLayer* layer : {base, additive}) {
+                keys(node->LclRotation, layer, "Y", {{0, random.real(-90, 90)}, {3, random.real(-90, 90)}});
+                keys(node->LclTranslation, layer, "X", {{0, random.real(-9, 9)}, {1, 4}, {2, random.real(-9, 9)}});
+            }
+        }
+        nodes.push_back(node);
+    }
+    std::vector<FbxTime> times;
+    for (int frame = -10; frame < 150; ++frame)
+        times.push_back(seconds(frame / 24.0));
+    times.push_back(FBXSDK_TIME_INFINITE);
+    times.push_back(times.front());
+
+    std::vector<FbxAMatrix> together(times.size());
+    for (FbxNode* node : nodes) {
+        extensions::evaluateGlobalTransforms(*node, times.data(), static_cast<int>(times.size()), together.data());
+        for (std::size_t i = 0; i < times.size(); ++i) {
+            const FbxAMatrix alone = node->EvaluateGlobalTransform(times[i]);
+            ASSERT_EQ(std::memcmp(&together[i], &alone, sizeof alone), 0) << node->GetName() << ' ' << i;
+        }
+    }
+    for (auto node = nodes.rbegin(); node != nodes.rend(); ++node) { // children first, nothing in the cache
+        scene->GetRootNode()->LclTranslation.Set(FbxDouble3(0, 0, 0));
+        const std::vector<FbxAMatrix> before = [&] {
+            std::vector<FbxAMatrix> matrices;
+            for (const FbxTime& time : times)
+                matrices.push_back((*node)->EvaluateGlobalTransform(time));
+            return matrices;
+        }();
+        scene->GetRootNode()->LclTranslation.Set(FbxDouble3(0, 0, 0));
+        extensions::evaluateGlobalTransforms(**node, times.data(), static_cast<int>(times.size()), together.data());
+        ASSERT_EQ(std::memcmp(together.data(), before.data(), before.size() * sizeof(FbxAMatrix)), 0);
+    }
+    extensions::evaluateGlobalTransforms(*nodes.back(), nullptr, 0, nullptr);
 }
 
 TEST_F(NodeEvaluationTest, OfANodeInNoSceneIsItsStaticTransform) {
