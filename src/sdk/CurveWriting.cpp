@@ -8,6 +8,14 @@
 #include "calls/LastError.h"
 #include "model/FrameArithmetic.h"
 
+#include <algorithm>
+#include <array>
+#include <span>
+
+#ifndef TARNELL_FBX_EXTERNAL_FBXSDK
+#include <fbxsdk/extensions/CurveSamples.h>
+#endif
+
 namespace Tarnell::Fbx {
 
 using detail::channelAfter;
@@ -27,14 +35,32 @@ bool mayAddKeys(const TnFbxTime& range, detail::MemoryAccount& memory) {
     return memory.take(static_cast<std::uint64_t>(frames > 0 ? frames : 0) * kKeyBytes);
 }
 
-void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float scale, detail::FrameTimes& times) {
+/// Linear keys; another platform than ours is given each.
+void addLinearKeys(fbxsdk::FbxAnimCurve& curve, std::span<const fbxsdk::FbxTime> times, const float* values) {
+#ifdef TARNELL_FBX_EXTERNAL_FBXSDK
+    for (const fbxsdk::FbxTime& time : times) {
+        curve.KeySet(curve.KeyAdd(time), time, *values++, fbxsdk::FbxAnimCurveDef::eInterpolationLinear);
+    }
+#else
+    fbxsdk::extensions::addLinearKeys(curve, times.data(), values, static_cast<int>(times.size()));
+#endif
+}
+
+void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float scale, detail::FrameTimes& frameTimes) {
     const TnFbxTime range = channel.getTime();
-    times.begin(range.getStartFrame(), range.getFrameRate());
-    // wider than a frame, so that the count can pass the last int
-    for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
-        const float value = channel.getAnimatedValue(static_cast<float>(frame));
-        const fbxsdk::FbxTime time = times.at(frame);
-        curve.KeySet(curve.KeyAdd(time), time, value * scale, fbxsdk::FbxAnimCurveDef::eInterpolationLinear);
+    const std::int64_t count = detail::frameCount(range.getStartFrame(), range.getEndFrame());
+    frameTimes.begin(range.getStartFrame(), range.getFrameRate());
+    constexpr std::int64_t kBlockSize = 256;
+    std::array<fbxsdk::FbxTime, kBlockSize> times;
+    std::array<float, kBlockSize> values;
+    for (std::int64_t done = 0; done < count; done += kBlockSize) {
+        const auto size = static_cast<std::size_t>(std::min(kBlockSize, count - done));
+        for (std::size_t i = 0; i < size; ++i) {
+            const std::int64_t frame = range.getStartFrame() + done + static_cast<std::int64_t>(i);
+            times[i] = frameTimes.at(frame);
+            values[i] = channel.getAnimatedValue(static_cast<float>(frame)) * scale;
+        }
+        addLinearKeys(curve, std::span(times).first(size), values.data());
     }
 }
 

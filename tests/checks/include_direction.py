@@ -50,6 +50,7 @@ RULES = (
          # Only the bundled platform has extensions: builds against another one omit the includes.
          frozenset({("src/MaximumThreads.cpp", "<fbxsdk/extensions/Threads.h>"),
                     ("src/access/ItemReader.h", "<fbxsdk/extensions/ItemRuns.h>"),
+                    ("src/sdk/CurveWriting.cpp", "<fbxsdk/extensions/CurveSamples.h>"),
                     ("src/sdk/NodeGeometry.h", "<fbxsdk/extensions/NodeSamples.h>"),
                     ("src/sdk/PropertySampling.cpp", "<fbxsdk/extensions/CurveSamples.h>")})),
     Rule(("include/Fbx[!P]*.h",), re.compile("<fbxsdk.h>"), frozenset(),

@@ -282,6 +282,23 @@ void FbxAnimCurve::KeySet(int pKeyIndex, FbxTime pTime, float pValue,
         moveKey(keys, index, pTime.Get());
 }
 
+void extensions::addLinearKeys(FbxAnimCurve& curve, const FbxTime* times, const float* values, int count) {
+    for (int i = 0; i < count; ++i) {
+        const int index = curve.KeyAdd(times[i]);
+        curve.KeySet(index, times[i], values[i], FbxAnimCurveDef::eInterpolationLinear);
+        detail::CurveKeys& keys = curve.editKeys();
+        if (static_cast<std::size_t>(index) + 1 != keys.times.size())
+            continue;
+        // Those that follow the last key have its attributes.
+        const std::uint32_t attribute = keys.attributeOfKey.back();
+        for (; i + 1 < count && keys.times.back() < times[i + 1].Get(); ++i) {
+            keys.times.push_back(times[i + 1].Get());
+            keys.values.push_back(values[i + 1]);
+            keys.attributeOfKey.push_back(attribute);
+        }
+    }
+}
+
 float FbxAnimCurve::KeyGetValue(int pKeyIndex) const {
     return hasKey(keys(), pKeyIndex) ? keys().values[static_cast<std::size_t>(pKeyIndex)] : 0.0F;
 }

@@ -6,7 +6,10 @@
 #include <climits>
 #include <cmath>
 #include <cstdint>
+#include <random>
 #include <vector>
+
+#include <fbxsdk/extensions/CurveSamples.h>
 
 #include "AnimationFixture.h"
 
@@ -73,6 +76,39 @@ TEST_F(FbxAnimCurveTest, HasOneKeyPerTime) {
     EXPECT_EQ(last, 1);
     EXPECT_EQ(curve->KeyGetCount(), 2);
     EXPECT_EQ(curve->KeyGetValue(0), 1.0F);
+}
+
+TEST_F(FbxAnimCurveTest, HasTheSameKeysWhenManyAreAddedTogether) {
+    std::mt19937 random(3);
+    for (int round = 0; round < 50; ++round) {
+        std::vector<FbxTime> keyTimes;
+        std::vector<float> keyValues;
+        std::int64_t ticks = 0;
+        for (int i = 0; i < 40; ++i) {
+            ticks += static_cast<int>(random() % 12) - (round % 3); // now and then at the same time, or back
+            keyTimes.emplace_back(ticks);
+            keyValues.push_back(static_cast<float>(random() % 100));
+        }
+        FbxAnimCurve* other = FbxAnimCurve::Create(scene, "other");
+        for (FbxAnimCurve* each : {curve, other}) {
+            each->KeyClear();
+            each->KeySet(each->KeyAdd(FbxTime(25)), FbxTime(25), 7.0F, Def::eInterpolationCubic, Def::eTangentUser,
+                         3.0F);
+        }
+        for (std::size_t i = 0; i < keyTimes.size(); ++i)
+            key(keyTimes[i].Get(), keyValues[i]);
+
+        extensions::addLinearKeys(*other, keyTimes.data(), keyValues.data(), 40);
+
+        ASSERT_EQ(other->KeyGetCount(), curve->KeyGetCount());
+        for (int i = 0; i < curve->KeyGetCount(); ++i) {
+            EXPECT_EQ(other->KeyGetTime(i), curve->KeyGetTime(i));
+            EXPECT_EQ(other->KeyGetValue(i), curve->KeyGetValue(i));
+            EXPECT_EQ(other->KeyGetInterpolation(i), curve->KeyGetInterpolation(i));
+            EXPECT_EQ(other->KeyGetTangentMode(i), curve->KeyGetTangentMode(i));
+        }
+    }
+    extensions::addLinearKeys(*curve, nullptr, nullptr, 0);
 }
 
 TEST_F(FbxAnimCurveTest, AddsAKeyWithNothingButItsTime) {
