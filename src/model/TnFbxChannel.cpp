@@ -23,6 +23,9 @@ namespace {
 /// How close to a whole frame, in frames, still counts as that frame.
 constexpr float kExactFrameTolerance = 1e-4f;
 
+/// 2^24: whole frames up to there are exact as floats.
+constexpr float kFirstInexactFrame = 16777216.0f;
+
 /// The frame clamped to the range. NaN passes both tests.
 float clampToRange(float frame, const TnFbxTime& time) {
     const float start = static_cast<float>(time.getStartFrame());
@@ -203,10 +206,17 @@ float TnFbxChannel::getAnimatedValue(float frame) const {
     if (mValues.empty() || std::isnan(frame)) { // NaN is a frame outside every range
         return mValue;
     }
+    const auto count = static_cast<std::int64_t>(mCount);
+    if (std::fabs(frame) < kFirstInexactFrame) { // most requests are for a whole frame of the range
+        const int exact = static_cast<int>(frame);
+        const std::int64_t index = std::int64_t{exact} - mTime.getStartFrame();
+        if (static_cast<float>(exact) == frame && index >= 0 && index < count && exact <= mTime.getEndFrame()) {
+            return sampleAt(static_cast<std::size_t>(index));
+        }
+    }
     const float clamped = clampToRange(frame, mTime);
     const int whole = detail::truncateToInt(clamped); // kept: toward zero, so frame −4.5 starts from −4
     const std::int64_t index = std::int64_t{whole} - mTime.getStartFrame();
-    const auto count = static_cast<std::int64_t>(mCount);
     if (index < 0 || index >= count) {
         return mValue; // beyond 2^24 the float of the last frame can lie after the frame itself
     }
