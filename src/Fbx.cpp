@@ -55,19 +55,19 @@ template <class Object>
 bool read(const Fbx& fbx, TnFbxReadInfo& info, Object** objects, int& count) {
     const CallScope call;
     if (objects == nullptr) {
-        return fail("no place for the array of objects");
+        return fail("the pointer to the array of objects is null");
     }
     *objects = nullptr;
     count = 0;
     if (info.getFidelity() == kFbxFidelityFaithful) {
-        return info.getFileName().empty() ? fail("the read options name no file")
+        return info.getFileName().empty() ? fail("the read options have no file name")
                                           : faithful::readObjects(info, objects, count);
     }
     if (!info.haveAnimationStack()) { // kept: the name is required, though the first stack is read in any case
-        return fail("the read options name no animation stack");
+        return fail("the read options have no animation stack name");
     }
     if (info.getFileName().empty()) {
-        return fail("the read options name no file");
+        return fail("the read options have no file name");
     }
     FbxSdk sdk;
     if (!fbx.loadScene(info.getFileName(), sdk)) {
@@ -176,11 +176,11 @@ bool Fbx::writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>&
                     const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const {
     const CallScope call;
     if (info.getFileName().empty()) {
-        return fail("the write options name no file");
+        return fail("the write options have no file name");
     }
     const bool faithfully = info.getFidelity() == kFbxFidelityFaithful;
     if (!faithfully && info.getAnimationStackName().empty()) { // kept: required, though the stack has another name
-        return fail("the write options name no animation stack");
+        return fail("the write options have no animation stack name");
     }
     const auto place = detail::pointCachePlace(info.getFileName(), /*nodeName*/ "", /*extension*/ "");
     detail::NewFolders folders(std::string(place.folder)); // destroyed after the context, which removes its files

@@ -21,8 +21,9 @@ void noteRepairedCorners(const std::string& fileName, const fbxsdk::FbxNode& nod
             const bool hasPoints = mesh.GetControlPointsCount() > 0;
             const std::string file = fileName.empty() ? "" : fileName + ": ";
             warnings.add(file + '"' + node.GetName() + '"',
-                         hasPoints ? "corners of polygons name points that there are not, and are read as point 0"
-                                   : "the polygons name points, and there are none; they are left out");
+                         hasPoints
+                             ? "polygons refer to control points that do not exist; control point 0 is read instead"
+                             : "polygons refer to control points, but the mesh has none; the polygons are left out");
         }
     }
 }

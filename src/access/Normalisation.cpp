@@ -54,8 +54,8 @@ bool detail::Triangulation::visit(fbxsdk::FbxNode& node) {
 
 void detail::Triangulation::warnOfCoarser() const {
     if (const int count = coarserSurfaces(mConverter); count > 0) {
-        warn(std::to_string(count) + (count == 1 ? " surface" : " surfaces") +
-             " became a coarser mesh than asked for: it has too few control points for so many samples");
+        warn(std::to_string(count) + (count == 1 ? " surface was" : " surfaces were") +
+             " tessellated more coarsely than requested: too few control points for the number of samples");
     }
 }
 

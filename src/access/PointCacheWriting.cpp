@@ -74,9 +74,10 @@ const char* detail::pointCacheFault(const TnFbxMesh& mesh, const TnFbxTime& rang
         return "the mesh has no control points";
     }
     if (frames < 1 || frames != mesh.getNumberOfControlPointSets()) {
-        return "the mesh has not one set of control points per frame";
+        return "the mesh does not have one set of control points per frame";
     }
-    return frames > std::numeric_limits<int>::max() / points ? "the mesh has too many control points" : nullptr;
+    return frames > std::numeric_limits<int>::max() / points ? "the mesh has too many control points for a point cache"
+                                                             : nullptr;
 }
 
 bool detail::openPointCache(Cache& cache, const TnFbxMesh& mesh, const TnFbxTime& range, const PointCacheForm& form,

@@ -16,8 +16,8 @@ namespace {
 
 using detail::ObjectWarnings;
 
-constexpr const char* kNoNumbers = "values that are not finite numbers are written as they are, in ASCII as 0";
-constexpr const char* kNoRate = "samples at an invalid rate are written as keys at invalid times";
+constexpr const char* kNoNumbers = "values that are not finite are written unchanged, in ASCII files as 0";
+constexpr const char* kNoRate = "samples with an invalid frame rate are written as keys with invalid times";
 
 bool isRate(float framesPerSecond) { return std::isfinite(framesPerSecond) && framesPerSecond > 0.0f; }
 
@@ -121,10 +121,12 @@ void checkPolygons(const TnFbxMesh& mesh, ObjectWarnings& warnings) {
         corners += size > 0 ? size : 0;
     }
     if (anyEmpty) {
-        warnings.add(mesh.getName(), "polygons without corners are left out");
+        warnings.add(mesh.getName(), "polygons without polygon vertices are left out");
     }
     if (corners > mesh.getNumberOfPolygonVertices()) {
-        warnings.add(mesh.getName(), "polygons have more corners than the mesh; those beyond its last are at point 0");
+        warnings.add(
+            mesh.getName(),
+            "the polygons have more polygon vertices than the mesh; the missing ones are written as control point 0");
     }
 }
 
@@ -145,10 +147,10 @@ void detail::warnAboutRate(float framesPerSecond, bool isCustom) {
     char rate[32];
     std::snprintf(rate, sizeof rate, "%.9g", static_cast<double>(framesPerSecond));
     if (!isRate(framesPerSecond)) {
-        warn(std::string(rate) + " frames per second is not a valid rate: readers of the file use another one");
+        warn(std::string(rate) + " frames per second is not a valid frame rate; readers will use a different one");
     } else if (isCustom) {
         warn(std::string(rate) +
-             " frames per second: the file says that its rate is a custom one, but not which; times are exact, frame "
+             " frames per second is written as a custom frame rate without its value: times are exact, but frame "
              "numbers depend on the reader");
     }
 }
@@ -187,7 +189,7 @@ void detail::check(TnFbxLight& light, ObjectWarnings& warnings) {
 void detail::check(const TnFbxMesh& mesh, ObjectWarnings& warnings) {
     checkPolygons(mesh, warnings);
     if (!namesItsPointsOnly(mesh)) {
-        warnings.add(mesh.getName(), "polygons name control points that the mesh does not have");
+        warnings.add(mesh.getName(), "polygons refer to control points that do not exist");
     }
     if (!hasFiniteNumbers(mesh)) {
         warnings.add(mesh.getName(), kNoNumbers);

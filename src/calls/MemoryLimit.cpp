@@ -48,7 +48,7 @@ bool detail::MemoryAccount::take(std::uint64_t bytes) {
 }
 
 std::string detail::MemoryAccount::describe(const char* what) const {
-    return describeBytes(mNeeded) + " of " + what + " would be needed, and the limit is " + describeBytes(mLimit);
+    return describeBytes(mNeeded) + " of " + what + " would be needed; the limit is " + describeBytes(mLimit);
 }
 
 std::string detail::describeBytes(std::uint64_t bytes) {

@@ -23,7 +23,7 @@ public:
     void giveBack(std::uint64_t bytes) { mNeeded -= bytes; }
     std::uint64_t limit() const { return mLimit; }
     bool exceeded() const { return mNeeded > mLimit; }
-    /// "12.3 GiB of samples and points would be needed, and the limit is 8.0 GiB".
+    /// "12.3 GiB of samples and points would be needed; the limit is 8.0 GiB".
     std::string describe(const char* what = "samples and points") const;
 
 private:

@@ -260,7 +260,7 @@ private:
     FrameRange mRange;
 };
 
-constexpr const char* kAimed = "has a look-at point and no rotation: it is written turned toward the point";
+constexpr const char* kAimed = "look-at point, but no rotation: written with the rotation that aims it at the point";
 
 /// The point, the up vector and the roll; a target where they determine the rotation.
 void writeLookAt(WrittenScene& scene, TnFbxCamera& source, fbxsdk::FbxNode& node, FbxCamera& camera) {

@@ -168,7 +168,7 @@ bool applyPointCache(Scene& scene, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh,
                                              : readMaxCache(cache, time.GetSecondDouble() * scene.fileRate(), buffer));
     if (!read) {
         detail::warn(scene.fileName() + ": the point cache of \"" + node.GetName() +
-                     "\" cannot be read; its mesh is handed out without it");
+                     "\" cannot be read; the mesh is read without it");
         return false;
     }
     for (std::size_t i = 0; i < points.size(); ++i) {

@@ -33,7 +33,8 @@ FbxFaithful::~FbxFaithful() = default;
 bool FbxFaithful::load(const TnFbxReadInfo& info) {
     mFile->info = info;
     return call(info, [&] {
-        return info.getFileName().empty() ? detail::fail("the read options name no file") : mFile->scene.load(info);
+        return info.getFileName().empty() ? detail::fail("the read options have no file name")
+                                          : mFile->scene.load(info);
     });
 }
 

@@ -38,7 +38,7 @@ double sizeAt(const Scene& scene, const FbxNode& node, fbxsdk::FbxPropertyT<fbxs
     if (property.IsAnimated() && (property.EvaluateValue(timeline.at(static_cast<double>(timeline.first()))) != now ||
                                   property.EvaluateValue(timeline.at(static_cast<double>(timeline.last()))) != now)) {
         detail::warn(scene.fileName() + ": the size of \"" + node.GetName() +
-                     "\" is animated, and objects hold one size: that of the frame of the static values");
+                     "\" is animated; only its value at the frame of the static values is read");
     }
     return now;
 }

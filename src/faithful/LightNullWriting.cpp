@@ -12,7 +12,7 @@ namespace Tarnell::Fbx::faithful {
 namespace {
 
 constexpr double kFullIntensity = 100.0; // of a light in a file
-constexpr const char* kAlpha = "the alpha of lights is not written: files have none";
+constexpr const char* kAlpha = "the alpha of lights is not written: FBX files have none";
 
 /// The reverse direction of a table for reading.
 template <class Value, std::size_t kCount>

@@ -298,7 +298,8 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
     FbxMesh& source = *node.GetMesh();
     const std::int64_t cornerCount = Corners(source, false).count();
     if (cornerCount > std::numeric_limits<int>::max()) {
-        return detail::fail(scene.fileName() + ": the mesh of \"" + node.GetName() + "\" has too many corners");
+        return detail::fail(scene.fileName() + ": the mesh of \"" + node.GetName() +
+                            "\" has too many polygon vertices");
     }
     detail::noteRepairedCorners(scene.fileName(), node, source, scene.warnings());
     // Whether the corners are reversed is known later: there may be no match after all.
@@ -325,7 +326,7 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
         return true;
     } catch (const std::runtime_error& error) { // the platform's message about a layer element without its array
         mesh.initMesh();
-        return detail::fail(scene.fileName() + ": the layers of \"" + node.GetName() + "\" are damaged (" +
+        return detail::fail(scene.fileName() + ": the layer elements of \"" + node.GetName() + "\" are damaged (" +
                             error.what() + ")");
     }
 }
@@ -341,7 +342,8 @@ bool addPoints(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh
     const FbxTime time = scene.now();
     const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
     if (placed.points().size() != static_cast<std::size_t>(mesh.getNumberOfControlPoints())) {
-        return detail::fail(scene.fileName() + ": \"" + node.GetName() + "\" has other points than it had");
+        return detail::fail(scene.fileName() + ": \"" + node.GetName() +
+                            "\" has a different number of control points than before");
     }
     mesh.addControlPointSet();
     for (const FbxVector4& point : placed.points()) {

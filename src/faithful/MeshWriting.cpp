@@ -25,13 +25,13 @@ namespace {
 using fbxsdk::FbxAMatrix;
 using fbxsdk::FbxVector4;
 
-constexpr const char* kTooManyCorners = "is left out: the polygons have more polygon vertices than the mesh";
-constexpr const char* kFlat = "its points were multiplied by a singular transform: they are written where they are, "
-                              "without the transform";
-constexpr const char* kNoCache = "its points move, and no point cache was asked for: the first set of points is "
-                                 "written";
-constexpr const char* kOtherSets = "the number of its sets of points is not that of the frames of the range: the first "
-                                   "set is written";
+constexpr const char* kTooManyCorners = "left out: the polygons have more polygon vertices than the mesh";
+constexpr const char* kFlat = "its points were multiplied by a transform that has no inverse: they are written as they "
+                              "are, without the transform";
+constexpr const char* kNoCache =
+    "its control points are animated, but no point cache was requested: only the first set is written";
+constexpr const char* kOtherSets =
+    "it does not have one set of control points per frame of the range: only the first set is written";
 
 float asFloat(double value) { return static_cast<float>(value); }
 
@@ -151,7 +151,7 @@ void addCache(WrittenScene& scene, const TnFbxMesh& mesh, fbxsdk::FbxNode& node)
     } else if (detail::pointCacheFault(mesh, cacheRange(scene)) != nullptr) {
         scene.warnings().add(mesh.getName(), kOtherSets);
     } else if (!writeCache(scene, mesh, node)) {
-        detail::warn(mesh.getName() + ": is written without its animation: " + lastError());
+        detail::warn(mesh.getName() + ": written without its animation: " + lastError());
         dropCache(node);
     }
 }

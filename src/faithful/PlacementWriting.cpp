@@ -22,7 +22,7 @@ using Channel = TnFbxTransform::EFbxTransformChannelType;
 
 constexpr auto kSource = FbxNode::eSourcePivot;
 constexpr const char* kComponents[] = {"X", "Y", "Z"};
-constexpr const char* kPivots = "pivots are not written: what they move is not said";
+constexpr const char* kPivots = "pivots are not written: whether they apply to rotation or scale is not specified";
 
 bool anySet(const Channels3& channels) {
     return std::any_of(channels.begin(), channels.end(),

@@ -89,7 +89,8 @@ void triangulateSurfaces(Scene& scene) {
         const Attribute::EType type = typeOf(node);
         if (type == Attribute::eNurbs || type == Attribute::ePatch || type == Attribute::eNurbsSurface ||
             type == Attribute::eTrimNurbsSurface) {
-            detail::warn(scene.fileName() + ": the surface of \"" + node.GetName() + "\" cannot become a mesh");
+            detail::warn(scene.fileName() + ": the surface of \"" + node.GetName() +
+                         "\" cannot be converted to a mesh");
         }
         return true;
     });

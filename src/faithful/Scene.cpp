@@ -219,7 +219,8 @@ bool Scene::grantSamples(std::int64_t channels) {
     const std::int64_t frames = mTimeline.count();
     if (frames > kMostFrames) {
         return fail(mFileName + ": the animation has " + std::to_string(frames) + " frames at " +
-                    std::to_string(mTimeline.rate()) + " per second, and channels hold " + std::to_string(kMostFrames));
+                    std::to_string(mTimeline.rate()) + " per second; channels hold at most " +
+                    std::to_string(kMostFrames));
     }
     return grantBytes(static_cast<std::uint64_t>(frames * channels) * sizeof(float));
 }

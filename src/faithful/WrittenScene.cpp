@@ -16,7 +16,8 @@ namespace Tarnell::Fbx::faithful {
 namespace {
 
 constexpr const char* kStackWithoutName = "Take 001";
-constexpr const char* kNumbered = "objects of one name get numbers: this version tells them apart by their names";
+constexpr const char* kNumbered =
+    "objects with the same name are numbered: files of this version identify objects by name";
 
 std::string inLowerCase(std::string text) {
     std::transform(text.begin(), text.end(), text.begin(),

@@ -60,7 +60,7 @@ std::string openingFault(fbxsdk::FbxVertexCacheDeformer& deformer) {
     }
     fbxsdk::FbxCache* cache = deformer.GetCache();
     if (cache == nullptr) {
-        return "the file does not say which";
+        return "the file does not specify a cache";
     }
     fbxsdk::FbxStatus status;
     if (cache->IsOpen() || cache->OpenFileForRead(&status)) {

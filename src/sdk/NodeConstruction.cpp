@@ -25,7 +25,7 @@ template <class Container>
 fbxsdk::FbxNode* nodeWith(fbxsdk::FbxNodeAttribute* attribute, Container* container, const std::string& name) {
     fbxsdk::FbxNode* node = attribute != nullptr ? fbxsdk::FbxNode::Create(container, name.c_str()) : nullptr;
     if (node == nullptr) {
-        return none("a node cannot be made");
+        return none("the node cannot be created");
     }
     node->SetNodeAttribute(attribute);
     succeed();
@@ -45,7 +45,7 @@ const char* faultOf(const TnFbxMesh& mesh) {
 
 fbxsdk::FbxNode* FbxSdk::createCamera(fbxsdk::FbxScene* scene, const std::string& name) {
     if (scene == nullptr) {
-        return none("no scene to make a camera in");
+        return none("no scene to create a camera in");
     }
     fbxsdk::FbxCamera* camera = fbxsdk::FbxCamera::Create(scene, name.c_str());
     if (camera != nullptr) {
@@ -59,7 +59,7 @@ fbxsdk::FbxNode* FbxSdk::createCamera(fbxsdk::FbxScene* scene, const std::string
 
 fbxsdk::FbxNode* FbxSdk::createNull(fbxsdk::FbxManager* manager, const std::string& name) {
     if (manager == nullptr) {
-        return none("no FBX manager to make a null with");
+        return none("no FBX manager to create a null with");
     }
     fbxsdk::FbxNull* null = fbxsdk::FbxNull::Create(manager, name.c_str());
     if (null != nullptr) {
@@ -71,7 +71,7 @@ fbxsdk::FbxNode* FbxSdk::createNull(fbxsdk::FbxManager* manager, const std::stri
 
 fbxsdk::FbxNode* FbxSdk::createLight(fbxsdk::FbxScene* scene, TnFbxLight::EFbxLightType type, const std::string& name) {
     if (scene == nullptr) {
-        return none("no scene to make a light in");
+        return none("no scene to create a light in");
     }
     fbxsdk::FbxLight* light = fbxsdk::FbxLight::Create(scene, name.c_str());
     if (light != nullptr) {
@@ -95,17 +95,17 @@ fbxsdk::FbxNode* FbxSdk::createLight(fbxsdk::FbxScene* scene, TnFbxLight::EFbxLi
 
 fbxsdk::FbxNode* FbxSdk::createMesh(fbxsdk::FbxManager* manager, const TnFbxMesh* mesh, const std::string& name) {
     if (manager == nullptr || mesh == nullptr) {
-        return none("no FBX manager or no mesh to make a mesh of");
+        return none("no FBX manager or no source to create a mesh from");
     }
     if (const char* fault = faultOf(*mesh)) {
         return none(fault);
     }
     fbxsdk::FbxMesh* target = fbxsdk::FbxMesh::Create(manager, name.c_str());
     if (target == nullptr) {
-        return none("a mesh cannot be made");
+        return none("the mesh cannot be created");
     }
     if (!detail::buildMesh(*mesh, *target)) {
-        return none("a mesh without a layer cannot be filled");
+        return none("the layer of the mesh cannot be created");
     }
     fbxsdk::FbxNode* node = nodeWith(target, manager, name);
     if (node != nullptr) {
@@ -116,12 +116,12 @@ fbxsdk::FbxNode* FbxSdk::createMesh(fbxsdk::FbxManager* manager, const TnFbxMesh
 
 fbxsdk::FbxFileTexture* FbxSdk::createTexture(fbxsdk::FbxScene* scene, const std::string& fileName) {
     if (scene == nullptr) {
-        return none("no scene to make a texture in");
+        return none("no scene to create a texture in");
     }
     using Texture = fbxsdk::FbxFileTexture;
     Texture* texture = Texture::Create(scene, fileName.c_str()); // kept: the file name is the object's name too
     if (texture == nullptr) {
-        return none("a texture cannot be made");
+        return none("the texture cannot be created");
     }
     texture->SetFileName(fileName.c_str());
     texture->SetTextureUse(Texture::eStandard);
@@ -138,12 +138,12 @@ fbxsdk::FbxFileTexture* FbxSdk::createTexture(fbxsdk::FbxScene* scene, const std
 fbxsdk::FbxSurfaceLambert* FbxSdk::createLambertMaterial(fbxsdk::FbxManager* manager, const std::string& name,
                                                          int index) {
     if (manager == nullptr) {
-        return none("no FBX manager to make a material with");
+        return none("no FBX manager to create a material with");
     }
     const std::string numbered = name + std::to_string(index);
     fbxsdk::FbxSurfaceLambert* material = fbxsdk::FbxSurfaceLambert::Create(manager, numbered.c_str());
     if (material == nullptr) {
-        return none("a material cannot be made");
+        return none("the material cannot be created");
     }
     constexpr fbxsdk::FbxDouble3 kBlack(0.0, 0.0, 0.0);
     constexpr fbxsdk::FbxDouble3 kGrey(0.5, 0.5, 0.5);

@@ -33,10 +33,10 @@ bool exists(const std::string& file) {
     return std::filesystem::exists(file, ignored);
 }
 
-constexpr const char* kNoSets = "one set of points per frame of the range is missing; a point cache is named in the "
-                                "file and not written";
+constexpr const char* kNoSets = "it does not have one set of control points per frame of the range; the file refers to "
+                                "a point cache that is not written";
 constexpr const char* kOldCache =
-    "a point cache is named in the file and not written; an older one of its name is there";
+    "the file refers to a point cache that is not written; an older one with the same name exists";
 
 std::string fileNameOf(const Cache& cache) {
     Text relative, absolute;
@@ -89,7 +89,7 @@ void FbxSdk::addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const T
     const bool maya = info.getMayaVertexCacheFormat();
     const bool newest = info.getCompatibilityVersion() == TnFbxWriteInfo::kFbxVersion2016;
     if (!mapVertexCacheOnMesh(mManager, &node, maya, info.getFileName())) {
-        detail::warn(mesh.getName() + ": is written without its animation: " + lastError());
+        detail::warn(mesh.getName() + ": written without its animation: " + lastError());
         return;
     }
     if (animateVertexCacheOnMesh(&node, &mesh, maya, newest, time)) {
@@ -102,8 +102,8 @@ void FbxSdk::addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const T
         return;
     }
     // Without the deformer: it would read an older cache, or none.
-    detail::warn(mesh.getName() + ": is written without its animation: " + lastError() +
-                 (isOldThere ? "; an older point cache is still there" : ""));
+    detail::warn(mesh.getName() + ": written without its animation: " + lastError() +
+                 (isOldThere ? "; an older point cache still exists" : ""));
     pointCacheDeformerOf(node)->Destroy();
     if (cache != nullptr) {
         cache->Destroy();

@@ -100,7 +100,7 @@ public:
                 mSpan.addKeys(*node, mStack);
                 detail::check(*object, warnings);
             } else if (object != nullptr) {
-                warnings.add(object->getName(), "is left out: " + lastError());
+                warnings.add(object->getName(), "left out: " + lastError());
             }
         }
     }
@@ -108,7 +108,7 @@ public:
     /// kept: meshes of one name write the same file.
     void noteCacheOf(const std::string& mesh) {
         if (!mCached.insert(mesh).second) {
-            warnings.add(mesh, "meshes of one name have one point cache, that of the last");
+            warnings.add(mesh, "meshes with the same name share one point cache, that of the last of them");
         }
     }
 

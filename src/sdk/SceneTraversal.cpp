@@ -183,10 +183,10 @@ void warnOfSurfaces(const std::string& fileName, fbxsdk::FbxScene& scene, std::u
     if (count > 0 && objectName != nullptr) {
         detail::warnAbout(fileName, '"' + *objectName +
                                         "\" is a NURBS surface, which is counted but not read: the "
-                                        "object handed out for it has neither name nor values");
+                                        "object returned for it has neither a name nor values");
     } else if (count > 0) {
         detail::warnAbout(fileName, std::to_string(count) + " NURBS surfaces are counted but not read: as many objects "
-                                                            "at the end of the list have neither name nor values");
+                                                            "at the end of the array have neither a name nor values");
     }
 }
 
@@ -223,7 +223,7 @@ bool visitNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node) {
         return true;
     }
     if (walk.index < 0 || walk.index >= walk.capacity) {
-        return fail(std::string("no room in the array for \"") + node.GetName() + '"');
+        return fail(std::string("the array is too small for \"") + node.GetName() + '"');
     }
     if (walk.allObjects) {
         readNode(sdk, walk, node, walk.objects[walk.index]);
@@ -425,7 +425,7 @@ bool FbxSdk::readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int 
             continue;
         }
         if (index >= count) {
-            return fail(std::string("no room in the array for \"") + row.name + '"');
+            return fail(std::string("the array is too small for \"") + row.name + '"');
         }
         getProducerCamera(camera, info, cameras, row.name, index);
     }
@@ -439,7 +439,7 @@ bool FbxSdk::getProducerCamera(fbxsdk::FbxCamera* camera, TnFbxReadInfo& info, T
     }
     fbxsdk::FbxNode* node = camera->GetNode(0);
     if (node == nullptr) {
-        return fail(std::string("\"") + name + "\" is not on any node");
+        return fail(std::string("\"") + name + "\" is not attached to a node");
     }
     if (info.getAllObjects()) {
         getProducerCamera(node, camera, cameras[index], name);

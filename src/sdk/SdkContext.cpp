@@ -114,7 +114,7 @@ bool FbxSdk::destroyFbxSdkManager() {
 
 bool FbxSdk::initializeSdkObjects(fbxsdk::FbxManager** manager, fbxsdk::FbxScene** scene) {
     if (manager == nullptr || scene == nullptr) {
-        return fail("no place for the FBX manager and its scene");
+        return fail("the pointer to the FBX manager or its scene is null");
     }
     *manager = fbxsdk::FbxManager::Create();
     if (*manager == nullptr) {
@@ -194,7 +194,7 @@ bool FbxSdk::convertNurbsAndPatchRecursive(fbxsdk::FbxManager* manager, fbxsdk::
     triangulation.warnOfCoarser();
     if (left > 0) {
         detail::warn(std::to_string(left) + (left == 1 ? " surface" : " surfaces") +
-                     " cannot become a mesh: the numbers make no surface, or one of too many samples");
+                     " cannot be converted to a mesh: invalid surface data, or too many samples");
     }
     return result;
 }

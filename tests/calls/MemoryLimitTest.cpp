@@ -34,7 +34,7 @@ TEST_F(MemoryLimit, GrantsUpToTheLimitAndCountsOnBeyondIt) {
     EXPECT_TRUE(account.take(1024));
     EXPECT_FALSE(account.take(1024));
     EXPECT_FALSE(account.take(1024));
-    EXPECT_EQ(account.describe(), "5.0 KiB of samples and points would be needed, and the limit is 3.0 KiB");
+    EXPECT_EQ(account.describe(), "5.0 KiB of samples and points would be needed; the limit is 3.0 KiB");
     account.begin();
     EXPECT_FALSE(account.exceeded());
 }
@@ -52,7 +52,7 @@ TEST_F(MemoryLimit, CountsNoFurtherThanThereAreBytes) {
     account.begin();
     EXPECT_FALSE(account.take(UINT64_MAX));
     EXPECT_FALSE(account.take(UINT64_MAX));
-    EXPECT_EQ(account.describe(), "16.0 EiB of samples and points would be needed, and the limit is 16 bytes");
+    EXPECT_EQ(account.describe(), "16.0 EiB of samples and points would be needed; the limit is 16 bytes");
 }
 
 } // namespace

@@ -47,7 +47,7 @@ inline bool limitMemory() {
 
 /// Whether the last call failed for that reason.
 inline bool isBeyondLimit() {
-    return Tarnell::Fbx::lastError().find("would be needed, and the limit is") != std::string::npos;
+    return Tarnell::Fbx::lastError().find("would be needed; the limit is") != std::string::npos;
 }
 
 /// Every object of a kind in a file.

@@ -188,7 +188,7 @@ TEST(FbxWriting, OfMeshesOfOneNameSaysThatTheyShareACache) {
     EXPECT_TRUE(write(info, objects)) << lastError();
     EXPECT_TRUE(write(info, objects)) << lastError();
 
-    EXPECT_THAT(lastWarnings(), ElementsAre(StartsWith("mesh: meshes of one name have one point cache")));
+    EXPECT_THAT(lastWarnings(), ElementsAre(StartsWith("mesh: meshes with the same name share one point cache")));
     EXPECT_EQ(folder.files("shot_fpc"), (std::vector<std::string>{"mesh.mcx", "mesh.xml"}));
 }
 

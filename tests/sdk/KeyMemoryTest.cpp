@@ -47,7 +47,7 @@ TEST_F(KeyMemory, OfMoreThanTheLimitIsRefusedWithAReason) {
     EXPECT_FALSE(write(std::numeric_limits<int>::max()));
 
     EXPECT_THAT(lastError(), StartsWith(folder.file("shot.fbx")));
-    EXPECT_THAT(lastError(), HasSubstr("32.0 GiB of keys would be needed, and the limit is 1.0 MiB"));
+    EXPECT_THAT(lastError(), HasSubstr("32.0 GiB of keys would be needed; the limit is 1.0 MiB"));
     EXPECT_THAT(folder.files(), IsEmpty());
 }
 
@@ -74,7 +74,7 @@ TEST_F(KeyMemory, OfRatesThatAreFarApartIsRefusedWithAReason) {
 
     EXPECT_FALSE(Fbx().writeFile(info, {&camera}, {}, {}, {}, {}));
 
-    EXPECT_THAT(lastError(), HasSubstr("of keys would be needed, and the limit is 1.0 MiB"));
+    EXPECT_THAT(lastError(), HasSubstr("of keys would be needed; the limit is 1.0 MiB"));
     EXPECT_THAT(folder.files(), IsEmpty());
 }
 

@@ -44,7 +44,7 @@ TEST(MeshMemory, BeyondTheLimitFailsAndSaysWhatWouldBeNeeded) {
     ASSERT_GT(meshes.count, 0);
     EXPECT_EQ(meshes.all[0].getNumberOfPolygons(), 0) << "the array is handed out all the same";
     EXPECT_THAT(lastError(), testing::HasSubstr("mesh_7400_ascii.fbx: "));
-    EXPECT_THAT(lastError(), testing::HasSubstr("would be needed, and the limit is 100 bytes"));
+    EXPECT_THAT(lastError(), testing::HasSubstr("would be needed; the limit is 100 bytes"));
 }
 
 TEST(MeshMemory, WithinTheLimitIsHandedOut) {
@@ -144,7 +144,7 @@ TEST_P(MeshInstancesOf, ManyPlacesDoNotFitIntoLessThanTheirPoints) {
     const Meshes meshes = read(/*sideBySide*/ true, /*mirrored*/ false);
 
     EXPECT_FALSE(meshes.read);
-    EXPECT_THAT(lastError(), testing::HasSubstr("would be needed, and the limit is 1.1 MiB"));
+    EXPECT_THAT(lastError(), testing::HasSubstr("would be needed; the limit is 1.1 MiB"));
 }
 
 TEST_P(MeshInstancesOf, MirroredPlacesGoTheirOwnWayRound) {

@@ -143,8 +143,8 @@ TEST_P(CornersBeyondThePoints, AreReadAsTheFirstPointWithAWarning) {
     EXPECT_EQ(meshes["one"].getPointIndex(2), 0);
     EXPECT_EQ(meshes["two"].getPointIndex(2), 0);
     EXPECT_THAT(lastWarnings(),
-                testing::ElementsAre(file + ": \"one\" and 1 more: corners of polygons name points that there "
-                                            "are not, and are read as point 0"));
+                testing::ElementsAre(file + ": \"one\" and 1 more: polygons refer to control points that do not exist; "
+                                            "control point 0 is read instead"));
 }
 
 TEST_P(CornersBeyondThePoints, AreSaidToBeLeftOutWhereThereIsNoPoint) {
@@ -157,8 +157,8 @@ TEST_P(CornersBeyondThePoints, AreSaidToBeLeftOutWhereThereIsNoPoint) {
 
     const std::unique_ptr<TnFbxMesh[]> owner(meshes);
     EXPECT_THAT(lastWarnings(),
-                Contains(file + ": \"one\" and 1 more: the polygons name points, and there are none; they are "
-                                "left out"));
+                Contains(file + ": \"one\" and 1 more: polygons refer to control points, but the mesh has none; "
+                                "the polygons are left out"));
 }
 
 INSTANTIATE_TEST_SUITE_P(BothFidelities, CornersBeyondThePoints,

@@ -153,8 +153,8 @@ TEST(CustomRate, IsWorkedOutWithAWarning) {
 
     EXPECT_EQ(nulls["node"].getTransformTime(kX).getFrameRate(), 12.5f);
     EXPECT_EQ(lastWarnings(),
-              std::vector<std::string>{file + ": the time mode is custom and states no frame rate; 12.5 frames per "
-                                              "second were worked out from its times"});
+              std::vector<std::string>{file + ": the time mode is custom, but states no frame rate; 12.5 frames per "
+                                              "second were derived from its times"});
 }
 
 TEST(CustomRate, IsThirtyWhereNothingTellsAnother) {
@@ -190,7 +190,7 @@ TEST(TextOfAnotherSystem, IsRefusedWithDecimalCommas) {
     int count = 0;
 
     EXPECT_FALSE(Fbx().getNulls(info, &nulls, count));
-    EXPECT_EQ(lastError(), file + ": line 14: the property \"CustomFrameRate\" has more numbers than its type holds");
+    EXPECT_EQ(lastError(), file + ": line 14: the property \"CustomFrameRate\" has more numbers than its type allows");
 }
 
 // Wherever an ASCII file ends, reading it gives its node or a reason.

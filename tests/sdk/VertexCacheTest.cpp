@@ -195,7 +195,7 @@ TEST_P(VertexCache, ThatNobodyNamesIsAWarning) {
     CacheScene scene(GetParam());
     scene.deformer->SetCache(nullptr);
     EXPECT_EQ(warningsOf(scene),
-              std::vector<std::string>{"\"mesh\" is read without its point cache: the file does not say which"});
+              std::vector<std::string>{"\"mesh\" is read without its point cache: the file does not specify a cache"});
 }
 
 TEST(MayaVertexCache, WithoutTheChannelOfItsDeformerIsAWarning) {

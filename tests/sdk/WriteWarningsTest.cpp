@@ -62,13 +62,13 @@ TEST_F(WriteWarnings, NameARateThatIsNone) {
     const std::pair<float, const char*> rates[] = {{0.0f, "0 "}, {-24.0f, "-24 "}, {kNaN, "nan "}, {kInfinity, "inf "}};
     for (const auto& [rate, text] : rates) {
         info.setFPS(rate);
-        EXPECT_THAT(warnings(), ElementsAre(AllOf(StartsWith(text), HasSubstr("not a valid rate"))));
+        EXPECT_THAT(warnings(), ElementsAre(AllOf(StartsWith(text), HasSubstr("not a valid frame rate"))));
     }
 }
 
 TEST_F(WriteWarnings, NameARateThatTheFileDoesNotTell) {
     info.setFPS(29.97f);
-    EXPECT_THAT(warnings(), ElementsAre(StartsWith("29.9699993 frames per second: the file says that its rate is a")));
+    EXPECT_THAT(warnings(), ElementsAre(StartsWith("29.9699993 frames per second is written as a custom frame rate")));
 
     info.setFPS(29.9700262f);
     EXPECT_THAT(warnings(), IsEmpty());
@@ -112,7 +112,7 @@ TEST_F(WriteWarnings, NameSamplesAtARateThatIsNone) {
     null.setTransformValueAt(TnFbxTransform::kFbxTransformPositionX, test::timeOf(1, 2, kNaN), {1.0f, 2.0f});
     objects.nulls = {&null};
 
-    EXPECT_THAT(warnings(), ElementsAre(AllOf(StartsWith("null: "), HasSubstr("invalid rate"))));
+    EXPECT_THAT(warnings(), ElementsAre(AllOf(StartsWith("null: "), HasSubstr("invalid frame rate"))));
 }
 
 TEST_F(WriteWarnings, NameMeshesThatContradictThemselves) {
@@ -128,9 +128,9 @@ TEST_F(WriteWarnings, NameMeshesThatContradictThemselves) {
     nowhere->setControlPoint(1, 0.0f, kNaN, 0.0f);
     objects.meshes = {outside.get(), below.get(), empty.get(), greedy.get(), nowhere.get()};
 
-    EXPECT_THAT(warnings(), ElementsAre("outside and 1 more: polygons name control points that the mesh does not have",
-                                        "empty: polygons without corners are left out",
-                                        StartsWith("greedy: polygons have more corners than the mesh"),
+    EXPECT_THAT(warnings(), ElementsAre("outside and 1 more: polygons refer to control points that do not exist",
+                                        "empty: polygons without polygon vertices are left out",
+                                        StartsWith("greedy: the polygons have more polygon vertices than the mesh"),
                                         AllOf(StartsWith("nowhere: "), HasSubstr("not finite"))));
 }
 
@@ -139,7 +139,7 @@ TEST_F(WriteWarnings, NameMeshesThatAreLeftOut) {
     none.setName("none");
     objects.meshes = {&none};
 
-    EXPECT_THAT(warnings(), ElementsAre("none: is left out: the mesh has no geometry"));
+    EXPECT_THAT(warnings(), ElementsAre("none: left out: the mesh has no geometry"));
 }
 
 TEST_F(WriteWarnings, NameMeshesWhosePointCacheIsNotThere) {
@@ -149,12 +149,14 @@ TEST_F(WriteWarnings, NameMeshesWhosePointCacheIsNotThere) {
     info.setAnimateMeshVertices(true);
     info.setEndFrame(3.0f);
 
-    EXPECT_THAT(warnings(), ElementsAre(StartsWith("still and 1 more: one set of points per frame")));
+    EXPECT_THAT(warnings(),
+                ElementsAre(StartsWith("still and 1 more: it does not have one set of control points per frame")));
     EXPECT_EQ(folder.files("shot_fpc"), (std::vector<std::string>{"moving.mcx", "moving.xml"}));
 
     folder.write("shot_fpc/other.xml", "of an earlier write");
-    EXPECT_THAT(warnings(), ElementsAre(StartsWith("still: one set of points per frame"),
-                                        AllOf(StartsWith("other: "), HasSubstr("an older one of its name is there"))));
+    EXPECT_THAT(warnings(),
+                ElementsAre(StartsWith("still: it does not have one set of control points per frame"),
+                            AllOf(StartsWith("other: "), HasSubstr("an older one with the same name exists"))));
 }
 
 } // namespace

@@ -138,9 +138,9 @@ private:
         mFacts.bytes += file->bytes().size();
         const detail::MayaCacheData data = detail::parseMayaCacheData(file->bytes());
         if (data.end < file->bytes().size())
-            fault(name, data.end, "cut off or damaged");
+            fault(name, data.end, "truncated or damaged");
         if (data.frames.empty())
-            fault(name, 0, "no sample in it");
+            fault(name, 0, "no samples");
         for (const detail::MayaCacheFrame& frame : data.frames) {
             const std::int32_t stated = frame.hasTime ? frame.ticks : mDescription.start;
             addSamples(file->bytes(), frame, ticks.value_or(stated));
@@ -194,7 +194,7 @@ private:
             if (*first != sample.count)
                 fault(mFacts.fileNames[sample.file], sample.offset,
                       channelText(mFacts.channelNames[sample.channel]) + ": " + pointsOf(sample.count) +
-                          ", its first sample has " + std::to_string(*first));
+                          ", but its first sample has " + std::to_string(*first));
         }
     }
 
@@ -209,7 +209,7 @@ private:
     /// Checks that the channel has a sample at every time of the description.
     void checkTimes(const detail::MayaCacheChannel& channel, const std::vector<double>& frames) {
         if (frames.empty()) {
-            fault(mFacts.description, 0, channelText(channel.name) + ": no sample of it");
+            fault(mFacts.description, 0, channelText(channel.name) + ": no samples");
             return;
         }
         if (!channel.regular || channel.samplingRate < 1)
@@ -266,7 +266,7 @@ void readMaxFacts(const std::string& name, std::span<const char> bytes, bool ver
     const bool isStep = facts.framesPerSample > 0.0 && facts.framesPerSample <= 1.0;
     const double step = isStep ? facts.framesPerSample : 1.0;
     if (!isStep)
-        fault(24, "frames per sample are to be above 0 and at most 1; readers take one frame per sample");
+        fault(24, "frames per sample must be above 0 and at most 1; readers assume one frame per sample");
     facts.start = std::isfinite(start) ? start : 0.0;
     facts.end = facts.start + static_cast<double>(facts.statedSamples > 0 ? facts.statedSamples - 1 : 0) * step;
     if (points < 1)
@@ -283,13 +283,12 @@ void readMaxFacts(const std::string& name, std::span<const char> bytes, bool ver
             fault(offset + *bad, "a number that is not finite");
     }
     if (complete < facts.statedSamples) {
-        fault(kMaxHeaderBytes + complete * sampleBytes, "cut off: " + std::to_string(facts.statedSamples - complete) +
+        fault(kMaxHeaderBytes + complete * sampleBytes, "truncated: " + std::to_string(facts.statedSamples - complete) +
                                                             " of " + std::to_string(facts.statedSamples) +
                                                             " samples are missing");
     } else if (kMaxHeaderBytes + complete * sampleBytes < bytes.size()) {
         fault(kMaxHeaderBytes + complete * sampleBytes,
-              std::to_string(bytes.size() - kMaxHeaderBytes - complete * sampleBytes) +
-                  " bytes behind the last sample");
+              std::to_string(bytes.size() - kMaxHeaderBytes - complete * sampleBytes) + " bytes after the last sample");
     }
 }
 

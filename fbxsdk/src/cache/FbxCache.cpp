@@ -115,8 +115,8 @@ bool appearsWithScene(const FbxCache& cache) {
 }
 
 const char* const kNotOpen = "the cache is not open";
-const char* const kNotMaya = "the open cache is no Maya cache";
-const char* const kNotMax = "the open cache is no Max point cache";
+const char* const kNotMaya = "the open cache is not a Maya cache";
+const char* const kNotMax = "the open cache is not a Max point cache";
 
 } // namespace
 } // namespace detail
@@ -159,17 +159,17 @@ void FbxCache::GetCacheFileName(FbxString& pRelativeFileName_UTF8, FbxString& pA
 bool FbxCache::OpenFileForRead(FbxStatus* pStatus) {
     Outcome outcome(pStatus);
     if (mFile)
-        return outcome.fail(FbxStatus::eFailure, "the cache is open already");
+        return outcome.fail(FbxStatus::eFailure, "the cache is already open");
     FbxString relative, absolute;
     GetCacheFileName(relative, absolute);
     const FbxScene* scene = GetScene();
     const std::string fbxFile = scene ? scene->sceneData().fileName() : std::string();
     const EFileFormat format = GetCacheFileFormat();
     if (format != eMayaCache && format != eMaxPointCacheV2)
-        return outcome.fail(FbxStatus::eInvalidParameter, "the cache is of no format that can be read");
+        return outcome.fail(FbxStatus::eInvalidParameter, "the format of the cache is not supported");
     const auto places = detail::cacheFileCandidates(fbxFile, relative.Buffer(), absolute.Buffer());
     if (places.empty())
-        return outcome.fail(FbxStatus::eInvalidParameter, "the cache names no file");
+        return outcome.fail(FbxStatus::eInvalidParameter, "the cache has no file name");
     for (const std::string& place : places) {
         auto file = std::make_unique<detail::CacheFile>();
         FbxStatus status;
@@ -247,7 +247,7 @@ int FbxCache::GetChannelCount(FbxStatus* pStatus) {
 
 bool FbxCache::GetChannelName(int pChannelIndex, FbxString& pChannelName, FbxStatus* pStatus) {
     if (pChannelIndex < 0 || pChannelIndex >= GetChannelCount(pStatus)) {
-        return Outcome(pStatus).fail(FbxStatus::eIndexOutOfRange, "no channel of that index");
+        return Outcome(pStatus).fail(FbxStatus::eIndexOutOfRange, "there is no channel with that index");
     }
     pChannelName = mFile->description()->channels[static_cast<std::size_t>(pChannelIndex)].name.c_str();
     return true;
@@ -255,7 +255,7 @@ bool FbxCache::GetChannelName(int pChannelIndex, FbxString& pChannelName, FbxSta
 
 bool FbxCache::GetChannelDataType(int pChannelIndex, EMCDataType& pChannelType, FbxStatus* pStatus) {
     if (pChannelIndex < 0 || pChannelIndex >= GetChannelCount(pStatus)) {
-        return Outcome(pStatus).fail(FbxStatus::eIndexOutOfRange, "no channel of that index");
+        return Outcome(pStatus).fail(FbxStatus::eIndexOutOfRange, "there is no channel with that index");
     }
     const std::string& type = mFile->description()->channels[static_cast<std::size_t>(pChannelIndex)].type;
     pChannelType = eUnknownData;
@@ -280,11 +280,11 @@ bool FbxCache::OpenFileForWrite(EMCFileCount pFileCount, double pSamplingFrameRa
                                 FbxStatus* pStatus) {
     Outcome outcome(pStatus);
     if (mFile)
-        return outcome.fail(FbxStatus::eFailure, "the cache is open already");
+        return outcome.fail(FbxStatus::eFailure, "the cache is already open");
     if (GetCacheFileFormat() != eMayaCache)
-        return outcome.fail(FbxStatus::eFailure, "the cache is no Maya cache");
+        return outcome.fail(FbxStatus::eFailure, "the cache is not a Maya cache");
     if (pFileCount != eMCOneFile)
-        return outcome.fail(FbxStatus::eFailure, "only caches in one file are written");
+        return outcome.fail(FbxStatus::eFailure, "only caches with one data file can be written");
     if (!(pSamplingFrameRate > 0.0))
         return outcome.fail(FbxStatus::eInvalidParameter, "the frame rate is not positive");
 
@@ -325,7 +325,7 @@ bool FbxCache::Read(int pChannelIndex, FbxTime& pTime, double* pBuffer, unsigned
         return outcome.fail(FbxStatus::eFailure, detail::kNotMaya);
     const auto& channels = mFile->mayaReader->description().channels;
     if (pChannelIndex < 0 || static_cast<std::size_t>(pChannelIndex) >= channels.size() || !pBuffer) {
-        return outcome.fail(FbxStatus::eIndexOutOfRange, "no channel of that index");
+        return outcome.fail(FbxStatus::eIndexOutOfRange, "there is no channel with that index");
     }
     const std::string& channel = channels[static_cast<std::size_t>(pChannelIndex)].name;
     return detail::faultToStatus(outcome.status, [&] {
@@ -379,7 +379,7 @@ bool FbxCache::GetAnimationRange(int pChannelIndex, FbxTime& pTimeStart, FbxTime
         return outcome.fail(FbxStatus::eFailure, detail::kNotMaya);
     const auto& channels = mFile->mayaReader->description().channels;
     if (pChannelIndex < 0 || static_cast<std::size_t>(pChannelIndex) >= channels.size()) {
-        return outcome.fail(FbxStatus::eIndexOutOfRange, "no channel of that index");
+        return outcome.fail(FbxStatus::eIndexOutOfRange, "there is no channel with that index");
     }
     if (!mFile->mayaReader->sampleRange(first, last))
         return outcome.fail(FbxStatus::eFailure, "no samples");
@@ -392,9 +392,9 @@ bool FbxCache::OpenFileForWrite(double pFrameStartOffset, double, unsigned int p
                                 FbxStatus* pStatus) {
     Outcome outcome(pStatus);
     if (mFile)
-        return outcome.fail(FbxStatus::eFailure, "the cache is open already");
+        return outcome.fail(FbxStatus::eFailure, "the cache is already open");
     if (GetCacheFileFormat() != eMaxPointCacheV2) {
-        return outcome.fail(FbxStatus::eFailure, "the cache is no Max point cache");
+        return outcome.fail(FbxStatus::eFailure, "the cache is not a Max point cache");
     }
     // The header's rate is frames per sample, whatever the frames per second are: one sample for every frame.
     const detail::PointCacheHeader header{pPointCount, pFrameStartOffset, 1.0, pSampleCount};
@@ -436,7 +436,7 @@ bool FbxCache::Read(unsigned int pFrameIndex, double* pBuffer, unsigned int pPoi
         return outcome.fail(FbxStatus::eFailure, detail::kNotMax);
     return detail::faultToStatus(outcome.status, [&] {
         return mFile->pointReader->read(detail::frameOf(pFrameIndex), {pBuffer, std::size_t{pPointCount} * 3}) ||
-               outcome.fail(FbxStatus::eInvalidParameter, "the cache has another number of points");
+               outcome.fail(FbxStatus::eInvalidParameter, "the cache has a different number of points");
     });
 }
 

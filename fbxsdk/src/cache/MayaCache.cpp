@@ -133,7 +133,7 @@ void MayaCacheReader::openOneFile(const std::string& base, FbxStatus& status) {
     MayaCacheData data = parseMayaCacheData(mData->bytes(), mData.get());
     // Samples that are missing would be read as the last one that exists.
     if (data.end < mData->bytes().size()) {
-        status.SetCode(FbxStatus::eInvalidFile, "%s: offset %zu: cut off or damaged", file.c_str(), data.end);
+        status.SetCode(FbxStatus::eInvalidFile, "%s: offset %zu: truncated or damaged", file.c_str(), data.end);
         return;
     }
     for (MayaCacheFrame& frame : data.frames) {
@@ -153,7 +153,7 @@ bool MayaCacheReader::readSample(const Sample& sample, const std::string& channe
             return false;
         frames = parseMayaCacheData(file->bytes(), file.get()).frames;
         if (frames.empty()) {
-            status.SetCode(FbxStatus::eInvalidFile, "%s: no sample in it", sample.file.c_str());
+            status.SetCode(FbxStatus::eInvalidFile, "%s: no samples", sample.file.c_str());
             return false;
         }
         frame = &frames.front();
@@ -217,7 +217,7 @@ std::unique_ptr<MayaCacheWriter> MayaCacheWriter::open(const std::string& descri
                                                        FileOperations& operations) {
     auto writer = std::make_unique<MayaCacheWriter>(descriptionFile, description, operations);
     if (writer->mDataFile == descriptionFile) {
-        status.SetCode(FbxStatus::eInvalidParameter, "a cache description cannot have the name of its data");
+        status.SetCode(FbxStatus::eInvalidParameter, "the cache description has the name of its data file");
         return nullptr;
     }
     for (OutputFile* const file : {&writer->mData, &writer->mText}) {
@@ -234,9 +234,9 @@ std::unique_ptr<MayaCacheWriter> MayaCacheWriter::open(const std::string& descri
 const char* MayaCacheWriter::faultOf(const MayaCacheChannel& channel, double seconds,
                                      std::span<const double> points) const {
     if (!(std::abs(seconds * kMayaTicksPerSecond) <= static_cast<double>(INT32_MAX)))
-        return "a sample at a time that a Maya cache cannot hold";
+        return "a sample is at a time that Maya caches cannot store";
     if (channel.name.size() > kMostMayaChannelName)
-        return "a channel with too long a name";
+        return "a channel name is too long";
     const bool doubles = channel.type != kFloatVectors;
     if (const char* fault = mayaCacheSampleFault(mDescription.wide, points.size() / 3, doubles))
         return fault;
@@ -256,7 +256,7 @@ bool MayaCacheWriter::write(std::size_t channel, double seconds, std::span<const
     if (failed(status))
         return false;
     if (channel >= mDescription.channels.size()) {
-        status.SetCode(FbxStatus::eIndexOutOfRange, "%s: no channel of that index", mDataFile.c_str());
+        status.SetCode(FbxStatus::eIndexOutOfRange, "%s: there is no channel with that index", mDataFile.c_str());
         return false;
     }
     MayaCacheChannel& target = mDescription.channels[channel];

@@ -205,11 +205,11 @@ const char* mayaCacheSampleFault(bool wide, std::uint64_t pointCount, bool doubl
     // The chunks before the points, with the longest name there may be.
     constexpr std::uint64_t kOverhead = kMostMayaChannelName + 256;
     if (pointCount == 0)
-        return "a sample without points";
+        return "a sample has no points";
     if (pointCount > kMost)
-        return "more points than a Maya cache can count";
+        return "a sample has more points than Maya caches can store";
     if (!wide && pointCount * 3 * (doubles ? 8 : 4) + kOverhead > kMost)
-        return "a sample of more than the 2 GiB that a cache with 32-bit sizes can hold";
+        return "a sample exceeds the 2 GiB that caches with 32-bit sizes can store";
     return nullptr;
 }
 

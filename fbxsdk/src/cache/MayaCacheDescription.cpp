@@ -95,7 +95,7 @@ bool readMayaCacheDescription(const std::string& fileName, MayaCacheDescription&
     if (!file)
         return false;
     if (file->bytes().size() > kMaximumBytes) {
-        status.SetCode(FbxStatus::eInvalidFile, "%s: a cache description of %zu bytes", fileName.c_str(),
+        status.SetCode(FbxStatus::eInvalidFile, "%s: the cache description is too large: %zu bytes", fileName.c_str(),
                        file->bytes().size());
         return false;
     }

@@ -39,17 +39,17 @@ const char* headerFault(const PointCacheHeader& header) {
     constexpr std::uint64_t kMostCount = INT32_MAX, kMostBytes = INT64_MAX;
     constexpr double kMostFrame = INT32_MAX;
     if (header.pointCount == 0)
-        return "samples without points";
+        return "the samples have no points";
     if (header.pointCount > kMostCount || header.sampleCount > kMostCount)
-        return "more points or samples than a point cache can count";
+        return "more points or samples than point caches can store";
     if (header.sampleCount > 0 && sampleBytes(header) > (kMostBytes - kHeaderBytes) / header.sampleCount)
-        return "more samples than a file can hold";
+        return "more samples than a file can store";
     if (!(std::abs(header.startFrame) <= kMostFrame))
-        return "an invalid start frame";
+        return "the start frame is invalid";
     // Large frame numbers are rounded in the header: every sample would be at another frame.
     constexpr double kHalfFrame = 0.5;
     const auto stored = static_cast<double>(static_cast<float>(header.startFrame));
-    return std::abs(stored - header.startFrame) < kHalfFrame ? nullptr : "a start frame that is too large";
+    return std::abs(stored - header.startFrame) < kHalfFrame ? nullptr : "the start frame is too large";
 }
 
 } // namespace
@@ -148,7 +148,8 @@ bool PointCacheWriter::write(double frame, const double* points, FbxStatus& stat
         return false;
     const double slot = std::round(frame - mHeader.startFrame);
     if (!(slot >= 0.0) || slot >= static_cast<double>(mHeader.sampleCount)) {
-        status.SetCode(FbxStatus::eIndexOutOfRange, "%s: a frame outside the cache's samples", mFileName.c_str());
+        status.SetCode(FbxStatus::eIndexOutOfRange, "%s: the frame is outside the range of the samples",
+                       mFileName.c_str());
         return false;
     }
     const std::span<const double> sample(points, std::size_t{mHeader.pointCount} * 3);

@@ -19,9 +19,9 @@ namespace detail {
     constexpr auto kMostFloat = static_cast<double>(std::numeric_limits<float>::max());
     for (const double value : points) {
         if (!std::isfinite(value))
-            return "a sample with points that are not finite";
+            return "a sample has points that are not finite";
         if (asFloats && std::abs(value) > kMostFloat)
-            return "a sample with points beyond what a float can hold";
+            return "a sample has points outside the range of floats";
     }
     return nullptr;
 }

@@ -121,7 +121,7 @@ private:
 
 bool AsciiReader::failUnexpected(const char* place, const std::string& expected) {
     if (place == mEnd) {
-        return fail(place, "the file ends where " + expected + " should follow");
+        return fail(place, "the file ends where " + expected + " is expected");
     }
     constexpr std::ptrdiff_t kShown = 40;
     const char* const end = std::max(tokenEnd(place, mEnd), place + 1);
@@ -133,7 +133,7 @@ bool AsciiReader::failUnexpected(const char* place, const std::string& expected)
 /// is one.
 bool AsciiReader::refuseZeros(std::string_view token) {
     const std::size_t zero = token.find('\0');
-    return zero == std::string_view::npos || fail(token.data() + zero, "a zero byte in the text");
+    return zero == std::string_view::npos || fail(token.data() + zero, "unexpected zero byte");
 }
 
 /// The end of the quoted text or the token that comes next; null for a text without a closing quote.
@@ -164,7 +164,7 @@ std::string_view AsciiReader::readToken() {
 /// The text that ends there, behind its closing quote.
 bool AsciiReader::readQuoted(const char* end, std::string_view& text) {
     if (end == nullptr) {
-        return fail(mNext, "a text has no closing quote");
+        return fail(mNext, "a string has no closing quote");
     }
     text = {mNext + 1, end - 1};
     if (text.find('&') != std::string_view::npos) {
@@ -192,7 +192,7 @@ bool AsciiReader::readRecords() {
         if (mNext == mEnd) {
             const Record& open = *mOpen.back().record;
             return mOpen.size() == 1 || fail(mEnd, "the file ends within the block of '" + std::string(open.name) +
-                                                       "' from line " + lineOf(mStart + open.location));
+                                                       "' that starts in line " + lineOf(mStart + open.location));
         }
         if (nextIs('}') && mOpen.size() > 1) {
             mOpen.pop_back();
@@ -350,7 +350,7 @@ bool AsciiReader::readBareValue(const char* end, Value& value) {
     }
     // A word behind a text is a name that lost its quotes; its end cannot be determined.
     if (token.size() > 1 && !mValues.empty() && mValues.back().type == Value::Type::text) {
-        return failUnexpected(start, "a quoted text");
+        return failUnexpected(start, "a quoted string");
     }
     value = Value::ofWord(token);
     return true;
@@ -364,7 +364,7 @@ bool AsciiReader::readArray(const Record& record, Value& value) {
     mNext = skipBlanks(mNext, mEnd);
     if (count.empty() || skipDigits(count.data(), count.data() + count.size()) != count.data() + count.size() ||
         !nextIs('{')) {
-        return failUnexpected(mNext, "a count and a brace");
+        return failUnexpected(mNext, "a count and '{'");
     }
     mNext = skipBlanks(mNext + 1, mEnd);
     if (!nextIs('}')) {
@@ -384,7 +384,7 @@ bool AsciiReader::readArray(const Record& record, Value& value) {
     if (const auto stated = static_cast<std::uint64_t>(parseInteger(count).value_or(kMostNumbers));
         run.count > stated) {
         return fail(start, "the list of '" + std::string(record.name) + "' holds " + std::to_string(run.count) +
-                               " numbers, but says " + std::to_string(stated));
+                               " numbers, but its count is " + std::to_string(stated));
     }
     StoredArray& array = keepArray(start, run);
     array.bitPatterns = mArrayVersion >= kFirstVersionWithBitPatterns && record.name == "KeyAttrDataFloat";

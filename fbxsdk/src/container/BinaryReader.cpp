@@ -188,7 +188,7 @@ void BinaryReader::closeBlock() {
 bool BinaryReader::readHead(Head& head) {
     const std::size_t size = mWide ? 3 * sizeof(std::uint64_t) + 1 : 3 * sizeof(std::uint32_t) + 1;
     if (mOpen.back().end - mOffset < size) {
-        return fail(mOffset, "record head exceeds " + std::string(mOpen.size() > 1 ? "its block" : "the file"));
+        return fail(mOffset, "record header exceeds " + std::string(mOpen.size() > 1 ? "its block" : "the file"));
     }
     mAhead.need(mOffset, size);
     const char* const bytes = mBytes.data() + mOffset;
@@ -222,7 +222,7 @@ bool BinaryReader::readRecord(const Head& head, std::size_t start) {
     const std::size_t left = blockEnd - mOffset;
     if (head.nameLength > left || head.valueBytes > left - head.nameLength) {
         return fail(start, "values of " + std::to_string(head.valueBytes) + " bytes exceed " +
-                               (mOpen.size() > 1 ? "the block around their record" : "the file"));
+                               (mOpen.size() > 1 ? "the block that contains the record" : "the file"));
     }
     Record& record = appendRecord(textAt(mOffset, head.nameLength));
     record.location = start;
@@ -232,7 +232,8 @@ bool BinaryReader::readRecord(const Head& head, std::size_t start) {
     const std::size_t valuesEnd = mOffset + static_cast<std::size_t>(head.valueBytes);
     if (head.end != 0 && (head.end < valuesEnd || head.end > blockEnd)) {
         return fail(start, "end offset " + std::to_string(head.end) + " of record '" + std::string(record.name) +
-                               "' lies outside of " + std::to_string(valuesEnd) + " to " + std::to_string(blockEnd));
+                               "' is outside the range " + std::to_string(valuesEnd) + " to " +
+                               std::to_string(blockEnd));
     }
     if (!readValues(record, head, valuesEnd)) {
         return false;
@@ -360,7 +361,7 @@ bool BinaryReader::readScalarList(Record& record, std::size_t count, std::size_t
 
 bool BinaryReader::readValue(Value& value, std::size_t end) {
     if (mOffset == end) {
-        return fail(mOffset, "the record has fewer values than it says");
+        return fail(mOffset, "the record has fewer values than its header states");
     }
     mAhead.need(mOffset, 1);
     const char code = mBytes[mOffset++];
@@ -416,7 +417,7 @@ bool BinaryReader::readScalar(Value& value, std::size_t end) {
 
 bool BinaryReader::readLetter(Value& value, std::size_t end) {
     if (mOffset == end) {
-        return fail(mOffset, "a letter exceeds its record");
+        return fail(mOffset, "a character exceeds its record");
     }
     value = Value::ofWord(textAt(mOffset++, 1));
     return true;
@@ -425,11 +426,11 @@ bool BinaryReader::readLetter(Value& value, std::size_t end) {
 bool BinaryReader::readText(Value& value, Value::Type type, std::size_t end) {
     constexpr std::size_t kSizeBytes = 4;
     if (end - mOffset < kSizeBytes) {
-        return fail(mOffset, "the size of a text exceeds its record");
+        return fail(mOffset, "the size of a string exceeds its record");
     }
     const auto size = numberAt<std::uint32_t>(mOffset);
     if (size > end - mOffset - kSizeBytes) {
-        return fail(mOffset, "text of " + std::to_string(size) + " bytes exceeds its record");
+        return fail(mOffset, "string of " + std::to_string(size) + " bytes exceeds its record");
     }
     mOffset += kSizeBytes;
     if (type == Value::Type::raw && size > kMostReadAlong) {
@@ -450,7 +451,7 @@ bool BinaryReader::readArray(Value& value, StoredArray::Element element, std::si
     constexpr std::size_t kHeadBytes = 12;
     const std::size_t start = mOffset;
     if (end - start < kHeadBytes) {
-        return fail(start, "the head of an array exceeds its record");
+        return fail(start, "array header exceeds its record");
     }
     const auto count = numberAt<std::uint32_t>(start);
     const auto encoding = numberAt<std::uint32_t>(start + 4);
@@ -487,14 +488,15 @@ bool BinaryReader::checkArray(const StoredArray& array, std::size_t offset) {
     const bool fits =
         array.compressed ? size <= kMaxDeflateRatio * array.bytes.size() + kDeflateSlack : size == array.bytes.size();
     if (!fits) {
-        return fail(offset, "array of " + std::to_string(array.count) + " elements does not agree with its " +
+        return fail(offset, "array of " + std::to_string(array.count) + " elements does not match its " +
                                 std::to_string(array.bytes.size()) + " bytes");
     }
     if (array.compressed) {
         mExpanded += array.count * sizeof(double);
     }
     if (mExpanded > kMaxExpansion * mBytes.size() + kFreeExpansion) {
-        return fail(offset, "the arrays expand to more than " + std::to_string(kMaxExpansion) + " times the file");
+        return fail(offset,
+                    "the arrays expand to more than " + std::to_string(kMaxExpansion) + " times the size of the file");
     }
     return true;
 }

@@ -121,8 +121,9 @@ void BinarySink::endRecord() {
 
 void BinarySink::checkSize() {
     if (mOutput.size() > mMaxSize) {
-        setFault("the file outgrows the " + std::to_string(mMaxSize) + " bytes that a binary file of version " +
-                 std::to_string(mVersion) + " can have; version " + std::to_string(kFirstWideVersion) + " can");
+        setFault("the file exceeds the " + std::to_string(mMaxSize) + " bytes that a binary file of version " +
+                 std::to_string(mVersion) + " can have; files of version " + std::to_string(kFirstWideVersion) +
+                 " can be larger");
     }
 }
 
@@ -208,7 +209,7 @@ void BinarySink::letter(char value) { scalar('C', value); }
 void BinarySink::sizedBytes(char code, std::string_view first, std::string_view second, std::string_view third) {
     const std::uint64_t size = first.size() + second.size() + third.size();
     if (size > kMaxValueBytes) {
-        setFault("a text of " + std::to_string(size) + " bytes is longer than a file can hold");
+        setFault("a string of " + std::to_string(size) + " bytes is too long for the file format");
         return;
     }
     scalar(code, static_cast<std::uint32_t>(size));
@@ -237,7 +238,7 @@ void BinarySink::arrayOf(char arrayCode, char scalarCode, std::span<const Number
 template <class Number>
 void BinarySink::packedArray(char code, std::span<const Number> values) {
     if (values.size_bytes() > kMaxValueBytes) {
-        setFault("an array of " + std::to_string(values.size()) + " elements is longer than a file can hold");
+        setFault("an array of " + std::to_string(values.size()) + " elements is too long for the file format");
         return;
     }
     std::vector<char> swapped;

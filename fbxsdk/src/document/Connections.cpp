@@ -47,9 +47,9 @@ void dropImpossible(DocumentBuilder& builder) {
     const std::size_t unknown = std::erase_if(
         connections, [&](const DocumentConnection& connection) { return !endsExist(document, connection); });
     if (toItself != 0)
-        builder.warn(std::to_string(toItself) + " connections lead from an object to itself; they are left out.");
+        builder.warn(std::to_string(toItself) + " connections link an object to itself; they are left out");
     if (unknown != 0)
-        builder.warn(std::to_string(unknown) + " connections have an end that no object is; they are left out.");
+        builder.warn(std::to_string(unknown) + " connections refer to objects that do not exist; they are left out");
 }
 
 void dropDoubled(std::vector<DocumentConnection>& connections) {
@@ -108,8 +108,8 @@ private:
             if (const DocumentObject* child = childOf(connections[i])) {
                 std::uint32_t& edge = mParentEdge[indexOf(*child)];
                 if (edge != kNone) {
-                    mBuilder.warn("The Model " + quotedName(child->name) +
-                                  " has more than one parent; only the first one counts.");
+                    mBuilder.warn("the Model " + quotedName(child->name) +
+                                  " has more than one parent; the first one is used");
                     continue;
                 }
                 edge = kept;
@@ -142,8 +142,8 @@ private:
             if (model == kNone || walkOf[model] != walk)
                 continue;
             mDocument.connections[mParentEdge[model]].destination = 0;
-            mBuilder.warn("The Model " + quotedName(mDocument.objects[model].name) +
-                          " is its own ancestor; it becomes a child of the root.");
+            mBuilder.warn("the Model " + quotedName(mDocument.objects[model].name) +
+                          " is its own ancestor; it is placed below the root");
         }
     }
 

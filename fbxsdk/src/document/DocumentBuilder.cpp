@@ -67,7 +67,7 @@ void DocumentBuilder::indexObjects() {
     std::size_t position = 0;
     std::erase_if(objects, [&](const DocumentObject&) { return doubled[position++]; });
     fill();
-    warn(std::to_string(doubledCount) + " objects have the id of an earlier object; they are left out.");
+    warn(std::to_string(doubledCount) + " objects have the id of an earlier object; they are left out");
 }
 
 void DocumentBuilder::connect(std::int64_t source, std::int64_t destination, std::string_view destinationProperty,
@@ -82,7 +82,7 @@ void DocumentBuilder::warn(std::string sentence) {
         return;
     }
     ++mSilentWarnings;
-    const std::string rest = std::to_string(mSilentWarnings) + " more warnings are not listed.";
+    const std::string rest = std::to_string(mSilentWarnings) + " more warnings are not listed";
     if (mSilentWarnings == 1)
         warnings.push_back(rest);
     else

@@ -44,7 +44,7 @@ void readObject(DocumentBuilder& builder, const Record& record) {
     }
     const std::int64_t id = record.value(0).isNumber() ? record.value(0).toInteger() : 0;
     if (id == 0) {
-        builder.warn(record, "an object without an id of its own is left out.");
+        builder.warn(record, "the object has no id; it is left out");
         return;
     }
     const std::string_view name = nameWithoutClass(record.value(1).toText(), builder.tree().ascii);
@@ -69,7 +69,7 @@ void readConnections(DocumentBuilder& builder, const Record& list) {
             builder.connect(ends.source->toInteger(), ends.destination->toInteger(), ends.destinationProperty,
                             ends.sourceProperty);
         else
-            builder.warn(record, "this is no connection between two objects; it is left out.");
+            builder.warn(record, "not a connection between two objects; it is left out");
     }
 }
 

@@ -123,8 +123,9 @@ bool readByGeneration(DocumentBuilder& builder, FbxStatus& status) {
 std::unique_ptr<Document> readDocument(std::unique_ptr<RecordTree> tree, FbxStatus& status) {
     const std::uint32_t version = versionOf(*tree);
     if (!isSupportedVersion(version)) {
-        status.SetCode(FbxStatus::eInvalidFileVersion, "%s: file version %u is not supported; %u to %u are.",
-                       tree->fileName.c_str(), version, kOldestVersion, kFirstUnknownVersion - 1);
+        status.SetCode(FbxStatus::eInvalidFileVersion,
+                       "%s: file version %u is not supported; supported versions are %u to %u", tree->fileName.c_str(),
+                       version, kOldestVersion, kFirstUnknownVersion - 1);
         return nullptr;
     }
     if (!checkSections(*tree, status) || !checkValueCounts(*tree, status))

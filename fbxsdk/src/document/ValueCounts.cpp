@@ -95,7 +95,7 @@ const Record* faultyLine(const Record& parent) {
 bool checkValueCounts(const RecordTree& tree, FbxStatus& status) {
     const Record* line = tree.ascii ? faultyLine(tree.root) : nullptr;
     if (line)
-        status.SetCode(FbxStatus::eInvalidFile, "%s: %s: the property \"%s\" has more numbers than its type holds",
+        status.SetCode(FbxStatus::eInvalidFile, "%s: %s: the property \"%s\" has more numbers than its type allows",
                        tree.fileName.c_str(), tree.placeOf(*line).c_str(),
                        std::string(line->value(0).toText()).c_str());
     return line == nullptr;

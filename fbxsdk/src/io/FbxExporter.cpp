@@ -53,16 +53,16 @@ bool FbxExporter::Initialize(const char* pFileName, int pFileFormat, FbxIOSettin
         return false;
     const int writer = writerOf(*GetFbxManager()->GetIOPluginRegistry(), pFileName, pFileFormat);
     if (writer < 0) {
-        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: there is no writer number %d", pFileName, pFileFormat);
+        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: there is no writer with index %d", pFileName, pFileFormat);
         return false;
     }
     const FbxString folder = FbxPathUtils::GetFolderName(FbxPathUtils::Resolve(pFileName));
     if (!FbxPathUtils::Exist(folder)) {
-        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: there is no folder %s", pFileName, folder.Buffer());
+        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: the folder %s does not exist", pFileName, folder.Buffer());
         return false;
     }
     if (FbxPathUtils::Exist(pFileName)) {
-        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: this is a folder", pFileName);
+        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: is a folder", pFileName);
         return false;
     }
     mFileFormat = writer;
@@ -148,7 +148,7 @@ bool writeFile(FbxScene& scene, const std::string& fileName, const VersionTraits
 bool FbxExporter::Export(FbxDocument* pDocument, bool) {
     mStatus.Clear();
     if (mFileFormat < 0) {
-        mStatus.SetCode(FbxStatus::eFailure, "no file is named to export to");
+        mStatus.SetCode(FbxStatus::eFailure, "no file is open");
         return false;
     }
     auto* scene = FbxCast<FbxScene>(pDocument);
@@ -162,8 +162,7 @@ bool FbxExporter::Export(FbxDocument* pDocument, bool) {
         return detail::faultToStatus(
             mStatus, [&] { return writeFile(*scene, mFileName, chosen ? *chosen : kNewestVersion, binary, mStatus); });
     } catch (const std::bad_alloc&) {
-        mStatus.SetCode(FbxStatus::eInsufficientMemory, "%s: there is not enough memory to write it",
-                        mFileName.c_str());
+        mStatus.SetCode(FbxStatus::eInsufficientMemory, "%s: not enough memory to write it", mFileName.c_str());
         return false;
     }
 }

@@ -39,7 +39,7 @@ bool FbxImporter::Initialize(const char* pFileName, int pFileFormat, FbxIOSettin
     if (!FbxIOBase::Initialize(pFileName, pFileFormat, pIOSettings))
         return false;
     if (pFileFormat < -1 || pFileFormat >= GetFbxManager()->GetIOPluginRegistry()->GetReaderFormatCount()) {
-        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: there is no reader number %d", pFileName, pFileFormat);
+        mStatus.SetCode(FbxStatus::eInvalidParameter, "%s: there is no reader with index %d", pFileName, pFileFormat);
         return false;
     }
     const auto readDocument = [&] { return (mDocument = detail::readDocument(mFileName, mStatus)) != nullptr; };

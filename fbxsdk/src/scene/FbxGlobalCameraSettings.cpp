@@ -88,7 +88,7 @@ bool FbxGlobalCameraSettings::SetDefaultCamera(const char* pCameraName, FbxStatu
         pStatus->Clear();
     if (!pCameraName || (!isFixedName(pCameraName) && !hasCamera(*mScene->GetRootNode(), pCameraName))) {
         if (pStatus)
-            pStatus->SetCode(FbxStatus::eInvalidParameter, "no camera %s", pCameraName ? pCameraName : "");
+            pStatus->SetCode(FbxStatus::eInvalidParameter, "there is no camera %s", pCameraName ? pCameraName : "");
         return false;
     }
     return mScene->GetGlobalSettings().SetDefaultCamera(pCameraName);

@@ -123,11 +123,11 @@ std::string fillFrameRate(const Document& document, const std::vector<FbxObject*
     const FbxAnimStack* first = nullptr;
     eachStack(document, objects, [&](const DocumentObject&, FbxAnimStack& stack) { first = first ? first : &stack; });
     const double rate = first ? frameRateOfTimes(timesOf(*first)) : 0.0;
-    const std::string start = "the time mode is custom and states no frame rate; ";
+    const std::string start = "the time mode is custom, but states no frame rate; ";
     if (rate <= 0.0)
-        return start + "nothing in the file tells one, 30 frames per second are assumed";
+        return start + "30 frames per second are assumed, since none can be derived from the file";
     settings.FindProperty("CustomFrameRate").Set(rate);
-    return start + rateText(rate) + " frames per second were worked out from its times";
+    return start + rateText(rate) + " frames per second were derived from its times";
 }
 
 } // namespace detail

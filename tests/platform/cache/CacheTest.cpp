@@ -381,11 +381,11 @@ TEST_F(FbxCacheTest, SaysWhichFileIsMissing) {
 TEST_F(FbxCacheTest, SaysThatItNamesNoFileOrNoFormat) {
     FbxCache* nameless = cacheAt("", FbxCache::eMayaCache);
     EXPECT_FALSE(nameless->OpenFileForRead(&status));
-    EXPECT_STREQ(status.GetErrorString(), "the cache names no file");
+    EXPECT_STREQ(status.GetErrorString(), "the cache has no file name");
 
     FbxCache* formless = cacheAt(folder.write("a.abc", "x"), FbxCache::eAlembic);
     EXPECT_FALSE(formless->OpenFileForRead(&status));
-    EXPECT_STREQ(status.GetErrorString(), "the cache is of no format that can be read");
+    EXPECT_STREQ(status.GetErrorString(), "the format of the cache is not supported");
 }
 
 TEST_F(FbxCacheTest, SaysThatAFileIsOfAnotherFormat) {

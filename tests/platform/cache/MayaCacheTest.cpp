@@ -215,7 +215,7 @@ TEST(MayaCache, SaysWhereItsDataIsDamaged) {
     EXPECT_FALSE(MayaCacheReader::open(file, status));
 
     EXPECT_STREQ(status.GetErrorString(),
-                 (folder.file("ball.mcx") + ": offset " + std::to_string(second) + ": cut off or damaged").c_str());
+                 (folder.file("ball.mcx") + ": offset " + std::to_string(second) + ": truncated or damaged").c_str());
 }
 
 TEST(MayaCache, TakesZerosBehindItsSamples) {

@@ -173,7 +173,7 @@ TEST(AsciiReader, KeepsBareWords) {
 
 TEST(AsciiReader, RefusesAWordThatLostItsQuotes) {
     EXPECT_EQ(asciiText("Children: \"Model::Omni1\", Model"),
-              "test.fbx: line 2: expected a quoted text instead of 'Model'");
+              "test.fbx: line 2: expected a quoted string instead of 'Model'");
     EXPECT_EQ(asciiText("P: \"a\", T"), "P: \"a\", 'T'");
 }
 
@@ -185,8 +185,8 @@ TEST(AsciiReader, ReadsArraysAndCountsThemItself) {
 // "35,5" where 35.5 is meant.
 TEST(AsciiReader, RefusesArraysThatHoldMoreThanTheySay) {
     EXPECT_EQ(asciiText("A: 1\nB: *2 {\n a: 35,5,1,25\n}"),
-              "test.fbx: line 4: the list of 'B' holds 4 numbers, but says 2");
-    EXPECT_EQ(asciiText("C: *0 { a: 1 }"), "test.fbx: line 2: the list of 'C' holds 1 numbers, but says 0");
+              "test.fbx: line 4: the list of 'B' holds 4 numbers, but its count is 2");
+    EXPECT_EQ(asciiText("C: *0 { a: 1 }"), "test.fbx: line 2: the list of 'C' holds 1 numbers, but its count is 0");
 }
 
 TEST(AsciiReader, ReadsLinesThatEndWithACarriageReturnAlone) {
@@ -203,15 +203,15 @@ TEST(AsciiReader, CountsLinesWithBothLineEndsOnce) {
 TEST(AsciiReader, AcceptsZerosBehindTheLastRecord) {
     EXPECT_EQ(asciiText("A: 1\nB: { C: 2 }\n" + std::string(5000, '\0')), "A: 1 B: { C: 2 }");
     EXPECT_EQ(asciiText("A: 1\nB: { C: 2 \n" + std::string(3, '\0')),
-              "test.fbx: line 4: the file ends within the block of 'B' from line 3");
+              "test.fbx: line 4: the file ends within the block of 'B' that starts in line 3");
 }
 
 TEST(AsciiReader, RefusesZerosAnywhereElse) {
     const std::string zeros(3, '\0');
-    EXPECT_EQ(asciiText("A: 1\n" + zeros + "Objects: { }"), "test.fbx: line 3: a zero byte in the text");
-    EXPECT_EQ(asciiText("A: 1\n" + zeros + "\nObjects: { }"), "test.fbx: line 3: a zero byte in the text");
-    EXPECT_EQ(asciiText("A: 1\nObj" + zeros + "ects: { }"), "test.fbx: line 3: a zero byte in the text");
-    EXPECT_EQ(asciiText("A: T" + zeros + "\n"), "test.fbx: line 2: a zero byte in the text");
+    EXPECT_EQ(asciiText("A: 1\n" + zeros + "Objects: { }"), "test.fbx: line 3: unexpected zero byte");
+    EXPECT_EQ(asciiText("A: 1\n" + zeros + "\nObjects: { }"), "test.fbx: line 3: unexpected zero byte");
+    EXPECT_EQ(asciiText("A: 1\nObj" + zeros + "ects: { }"), "test.fbx: line 3: unexpected zero byte");
+    EXPECT_EQ(asciiText("A: T" + zeros + "\n"), "test.fbx: line 2: unexpected zero byte");
     EXPECT_NE(asciiText("A: 1" + zeros + "2\n").find("line 2"), std::string::npos);
     EXPECT_NE(asciiText("A: *1 { a: 1" + zeros + "2 }\n").find("line 2"), std::string::npos);
     EXPECT_EQ(asciiText("A: \"x" + std::string(1, '\0') + "y\""), "A: \"x" + std::string(1, '\0') + "y\"");
@@ -234,14 +234,14 @@ TEST(AsciiReader, TakesAnArrayAsOneValueAmongOthers) {
 }
 
 TEST(AsciiReader, RefusesArraysThatAreNone) {
-    EXPECT_EQ(asciiText("A: *"), "test.fbx: line 2: the file ends where a count and a brace should follow");
-    EXPECT_EQ(asciiText("A: *x { a: 1 }"), "test.fbx: line 2: expected a count and a brace instead of '{'");
-    EXPECT_EQ(asciiText("A: *1 a: 1"), "test.fbx: line 2: expected a count and a brace instead of 'a'");
+    EXPECT_EQ(asciiText("A: *"), "test.fbx: line 2: the file ends where a count and '{' is expected");
+    EXPECT_EQ(asciiText("A: *x { a: 1 }"), "test.fbx: line 2: expected a count and '{' instead of '{'");
+    EXPECT_EQ(asciiText("A: *1 a: 1"), "test.fbx: line 2: expected a count and '{' instead of 'a'");
     EXPECT_EQ(asciiText("A: *1 { b: 1 }"), "test.fbx: line 2: expected 'a:' instead of 'b'");
     EXPECT_EQ(asciiText("A: *1 { a 1 }"), "test.fbx: line 2: expected 'a:' instead of 'a'");
     EXPECT_EQ(asciiText("A: *1 { a: \"x\" }"), "test.fbx: line 2: expected a number or '}' instead of '\"'");
     EXPECT_EQ(asciiText("A: *1 { a: 1 a: 2 }"), "test.fbx: line 2: expected a number or '}' instead of 'a'");
-    EXPECT_EQ(asciiText("A: *2 { a: 1,"), "test.fbx: line 2: the file ends where a number or '}' should follow");
+    EXPECT_EQ(asciiText("A: *2 { a: 1,"), "test.fbx: line 2: the file ends where a number or '}' is expected");
     EXPECT_EQ(asciiText("A: *1 { a: *1 { a: 1 } }"), "test.fbx: line 2: expected a number or '}' instead of '*1'");
 }
 
@@ -345,13 +345,13 @@ TEST(AsciiReader, RefusesWhatIsNoRecord) {
 }
 
 TEST(AsciiReader, RefusesAFileThatEndsWithinAText) {
-    EXPECT_EQ(asciiText("A: \"x\nB: 1\n"), "test.fbx: line 2: a text has no closing quote");
+    EXPECT_EQ(asciiText("A: \"x\nB: 1\n"), "test.fbx: line 2: a string has no closing quote");
     EXPECT_EQ(asciiText("A: 1\n\"B"), "test.fbx: line 3: expected a name with a colon instead of '\"'");
 }
 
 TEST(AsciiReader, RefusesAFileThatEndsWithinABlock) {
     EXPECT_EQ(asciiText("A: {\nB: {\n C: 1\n}\n"),
-              "test.fbx: line 6: the file ends within the block of 'A' from line 2");
+              "test.fbx: line 6: the file ends within the block of 'A' that starts in line 2");
 }
 
 TEST(AsciiReader, ShortensLongWordsInItsSentences) {

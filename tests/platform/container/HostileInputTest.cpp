@@ -209,8 +209,8 @@ TEST(HostileInput, RefusesArraysThatDisagreeWithTheirBytes) {
     EXPECT_EQ(readText(arrayFile(2, 0, sixteen)), "List: [0 0]");
     for (const std::size_t count : {0U, 1U, 3U, 0xFFFFFFFFU}) {
         const std::string sentence = readText(arrayFile(count, 0, sixteen));
-        EXPECT_EQ(sentence, "test.fbx: offset 45: array of " + std::to_string(count) +
-                                " elements does not agree with its 16 bytes");
+        EXPECT_EQ(sentence,
+                  "test.fbx: offset 45: array of " + std::to_string(count) + " elements does not match its 16 bytes");
     }
     EXPECT_EQ(readText(arrayFile(2, 2, sixteen)), "test.fbx: offset 45: unknown array encoding 2");
 }
@@ -238,7 +238,8 @@ TEST(HostileInput, RefusesArraysThatTogetherExpandBeyondReason) {
         file.begin("List").arrayOf('d', zeros.size(), 1, stream).end();
     }
 
-    EXPECT_NE(readText(file.finish()).find(": the arrays expand to more than 512 times the file"), std::string::npos);
+    EXPECT_NE(readText(file.finish()).find(": the arrays expand to more than 512 times the size of the file"),
+              std::string::npos);
 }
 
 std::string nestedBinary(int levels) {

@@ -37,7 +37,7 @@ TEST(Connections, DropsThoseWithUnknownEnds) {
         C: "OO",1,7
         C: "OO",0,1)");
     EXPECT_EQ(document->connections.size(), 1U);
-    EXPECT_TRUE(warnsOf(*document, "3 connections have an end that no object is"));
+    EXPECT_TRUE(warnsOf(*document, "3 connections refer to objects that do not exist"));
 }
 
 TEST(Connections, DropsThoseFromAnObjectToItself) {
@@ -46,7 +46,7 @@ TEST(Connections, DropsThoseFromAnObjectToItself) {
         C: "OO",1,1
         C: "PP",1, "a",1, "b")");
     EXPECT_EQ(document->connections.size(), 1U);
-    EXPECT_TRUE(warnsOf(*document, "2 connections lead from an object to itself"));
+    EXPECT_TRUE(warnsOf(*document, "2 connections link an object to itself"));
 }
 
 TEST(Connections, DropsUnknownKindsAndIncompleteOnes) {

@@ -85,7 +85,8 @@ TEST(ReadDocument, RefusesVersionsOutsideTheSupportedRange) {
 TEST(ReadDocument, NamesFileAndVersionWhenItRefuses) {
     FbxStatus status;
     EXPECT_EQ(tryDocument("FBXHeaderExtension: { FBXVersion: 8000 }", &status), nullptr);
-    EXPECT_STREQ(status.GetErrorString(), "test.fbx: file version 8000 is not supported; 3000 to 7999 are.");
+    EXPECT_STREQ(status.GetErrorString(),
+                 "test.fbx: file version 8000 is not supported; supported versions are 3000 to 7999");
 }
 
 TEST(ReadDocument, TakesTheDocumentsVersionFromAnOldBinary) {

@@ -77,7 +77,7 @@ TEST(Warnings, AreBounded) {
     for (int i = 0; i < 1000; ++i)
         builder.warn("a sentence");
     ASSERT_EQ(builder.document().warnings.size(), 101U);
-    EXPECT_EQ(builder.document().warnings.back(), "900 more warnings are not listed.");
+    EXPECT_EQ(builder.document().warnings.back(), "900 more warnings are not listed");
 }
 
 TEST(Warnings, QuoteLongNamesInPart) {

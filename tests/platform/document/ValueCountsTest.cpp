@@ -23,14 +23,14 @@ std::string oldFile(const std::string& line) {
 
 TEST(ValueCounts, OfALineWithTooManyNumbersAreAnError) {
     EXPECT_EQ(errorOf(newFile(R"(P: "Lcl Translation", "Lcl Translation", "", "A",35,5,0,0)")),
-              "test.fbx: line 5: the property \"Lcl Translation\" has more numbers than its type holds");
+              "test.fbx: line 5: the property \"Lcl Translation\" has more numbers than its type allows");
     EXPECT_EQ(errorOf(newFile(R"(P: "Size", "double", "Number", "",35,5)")),
-              "test.fbx: line 5: the property \"Size\" has more numbers than its type holds");
+              "test.fbx: line 5: the property \"Size\" has more numbers than its type allows");
     EXPECT_EQ(errorOf(oldFile(R"(Property: "Size", "double", "",35,5)")),
-              "test.fbx: line 5: the property \"Size\" has more numbers than its type holds");
+              "test.fbx: line 5: the property \"Size\" has more numbers than its type allows");
     EXPECT_EQ(errorOf("; FBX 7.4.0\nGlobalSettings: { Properties70: {\n"
                       "P: \"UnitScaleFactor\", \"double\", \"Number\", \"\",2,54\n} }\n"),
-              "test.fbx: line 3: the property \"UnitScaleFactor\" has more numbers than its type holds");
+              "test.fbx: line 3: the property \"UnitScaleFactor\" has more numbers than its type allows");
 }
 
 TEST(ValueCounts, OfSoundLinesAreNone) {

@@ -484,10 +484,10 @@ TEST_P(CacheWriting, RefusesSamplesWithoutPoints) {
         points.resize(3); // a null buffer is another fault
         FbxTime time;
         EXPECT_FALSE(cache->Write(0, time, points.data(), 0U, &status));
-        expectReason("without points");
+        expectReason("no points");
         EXPECT_FALSE(cache->CloseFile(&status));
     }
-    expectReason("without points");
+    expectReason("no points");
     EXPECT_TRUE(contents().empty());
 }
 
@@ -537,17 +537,17 @@ TEST_P(CacheWriting, RefusesMorePointsThanItsSizesCanSay) {
     if (isMax()) {
         make();
         EXPECT_FALSE(cache->OpenFileForWrite(0.0, 24.0, 1U, 0x80000000U, &status));
-        expectReason("can count");
+        expectReason("more points");
         EXPECT_FALSE(cache->OpenFileForWrite(0.0, 24.0, 0xFFFFFFFFU, 1U, &status));
-        expectReason("can count");
+        expectReason("more points");
         EXPECT_FALSE(cache->OpenFileForWrite(0.0, 24.0, 0x7FFFFFFFU, 0x7FFFFFFFU, &status));
-        expectReason("a file can hold");
+        expectReason("a file can store");
     } else {
         ASSERT_TRUE(open());
         FbxTime time;
         const unsigned int count = GetParam() == Kind::eWide ? 0x80000000U : 0x06000000U;
         EXPECT_FALSE(cache->Write(0, time, points.data(), count, &status)); // refused before a point is read
-        expectReason(GetParam() == Kind::eWide ? "can count" : "2 GiB");
+        expectReason(GetParam() == Kind::eWide ? "more points" : "2 GiB");
         EXPECT_FALSE(cache->CloseFile(&status));
     }
     EXPECT_TRUE(contents().empty());
@@ -601,7 +601,7 @@ TEST(MayaCacheFiles, CannotHaveTheSameName) {
     FbxStatus status;
 
     EXPECT_FALSE(detail::MayaCacheWriter::open(folder.file("ball.mc"), description, status));
-    EXPECT_STREQ(status.GetErrorString(), "a cache description cannot have the name of its data");
+    EXPECT_STREQ(status.GetErrorString(), "the cache description has the name of its data file");
     description.wide = true;
     EXPECT_TRUE(detail::MayaCacheWriter::open(folder.file("ball.mc"), description, status));
     EXPECT_TRUE(folder.files().empty());

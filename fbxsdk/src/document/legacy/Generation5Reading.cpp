@@ -78,14 +78,14 @@ private:
         for (const Value& name : children->values) {
             // A bare word here is a sign of damage: its meaning cannot be recovered.
             if (name.type == Value::Type::word) {
-                status.SetCode(FbxStatus::eInvalidFile, "%s, %s: a name in the list of children is not quoted.",
+                status.SetCode(FbxStatus::eInvalidFile, "%s: %s: a name in the list of children is not quoted",
                                mBuilder.tree().fileName.c_str(), mBuilder.tree().placeOf(*children).c_str());
                 return false;
             }
             if (const std::int64_t child = mObjects.find(name.toText()); child != 0)
                 mBuilder.connect(child, model);
             else
-                mBuilder.warn(*children, "there is no Model " + quotedName(name.toText()) + " to be a child.");
+                mBuilder.warn(*children, "the child Model " + quotedName(name.toText()) + " does not exist");
         }
         return true;
     }

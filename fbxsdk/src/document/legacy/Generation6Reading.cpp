@@ -158,7 +158,7 @@ private:
         if (record.name == "SceneInfo" || fullName.empty())
             return;
         if (mObjects.find(fullName) != 0) {
-            mBuilder.warn(record, "there is an object " + quotedName(fullName) + " already; this one is left out.");
+            mBuilder.warn(record, "an object " + quotedName(fullName) + " already exists; this one is left out");
             return;
         }
         if (record.name == "Model") {
@@ -256,7 +256,7 @@ private:
     void readConnection(const Record& record) {
         const ConnectionEnds ends = connectionEnds(record);
         if (!ends.source) {
-            mBuilder.warn(record, "this is no connection between two objects; it is left out.");
+            mBuilder.warn(record, "not a connection between two objects; it is left out");
             return;
         }
         const std::int64_t source = mObjects.find(ends.source->toText());

@@ -180,7 +180,7 @@ std::optional<CurveKeys> readLegacyCurve(DocumentBuilder& builder, const Record&
     CurveKeys curve;
     curve.defaultValue = static_cast<float>(channel.childValue("Default").toReal() * scale);
     if (!readKeys(builder, channel, *keys, curve)) {
-        builder.warn(*keys, "the keys do not add up; the curve is left out.");
+        builder.warn(*keys, "the key list is incomplete or does not match its key count; the curve is left out");
         return std::nullopt;
     }
     curve.before = readExtrapolation(channel, "Pre-Extrapolation");

@@ -41,7 +41,7 @@ TEST(Generation5, ChildrenListsMakeTheTree) {
 TEST(Generation5, AnUnknownChildIsLeftOut) {
     const auto document = documentOf("5.8.0", R"(Model: "Model::a" { Children: "Model::gone" })");
     EXPECT_EQ(document->objects.size(), 1U);
-    EXPECT_TRUE(warnsOf(*document, "there is no Model \"Model::gone\""));
+    EXPECT_TRUE(warnsOf(*document, "the child Model \"Model::gone\" does not exist"));
 }
 
 TEST(Generation5, AnUnquotedChildIsAnError) {

@@ -240,7 +240,7 @@ TEST(Generation6, KeepsTheFirstOfTwoObjectsOfOneName) {
                    Model: "Model::m", "Light" { } })");
     EXPECT_EQ(document->objects.size(), 2U); // the mesh and its geometry
     EXPECT_EQ(objectNamed(*document, "Model", "m")->subClass, "Mesh");
-    EXPECT_TRUE(warnsOf(*document, "\"Model::m\" already"));
+    EXPECT_TRUE(warnsOf(*document, "\"Model::m\" already exists"));
 }
 
 TEST(Generation6, UnknownEndsAreNotTakenForTheRoot) {
@@ -251,7 +251,7 @@ TEST(Generation6, UnknownEndsAreNotTakenForTheRoot) {
                        Connect: "OO", "Model::gone", "Model::a"
                        Connect: "OO", "Model::b", "Model::Scene" })");
     EXPECT_EQ(sourceNames(*document, 0, "Model"), (Names{"b", "a"}));
-    EXPECT_TRUE(warnsOf(*document, "2 connections have an end"));
+    EXPECT_TRUE(warnsOf(*document, "2 connections refer to objects that do not exist"));
 }
 
 TEST(Generation6, ReadsSettingsFromObjectsAndTheTail) {

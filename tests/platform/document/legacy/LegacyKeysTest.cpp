@@ -165,7 +165,7 @@ TEST(LegacyKeys, DropsCurvesThatDoNotAddUp) {
     for (const auto& [count, keys] : kLists) {
         const auto document = documentWithKeys(count, keys);
         EXPECT_TRUE(document->legacyCurves.empty()) << keys;
-        EXPECT_TRUE(warnsOf(*document, "the keys do not add up")) << keys;
+        EXPECT_TRUE(warnsOf(*document, "the key list is incomplete or does not match its key count")) << keys;
         EXPECT_EQ(objectNamed(*document, "AnimationCurve", ""), nullptr) << keys;
     }
 }
