@@ -112,7 +112,7 @@ test("opens without a complaint, and shows the scene", async () => {
   const { page, complaints } = await open(write("shot", shot));
   assert.ok((await coloursIn(page, ".view canvas")) > 20);
   assert.equal(await page.title(), "shot_010.fbx — FBX report");
-  assert.deepEqual(await page.$$eval("#camera option", (all) => all.map((option) => option.textContent)), ["From outside", "Through shotCam"]);
+  assert.deepEqual(await page.$$eval("#camera option", (all) => all.map((option) => option.textContent)), ["Outside view", "Through shotCam"]);
   assert.deepEqual(complaints, []);
   await page.close();
 });
@@ -293,7 +293,7 @@ test("a file of 20 MB opens in two seconds", async (context) => {
     const { page, complaints } = await open(file);
     best = Math.min(best, await page.evaluate(() => performance.getEntriesByName("drawn")[0].startTime));
     assert.deepEqual(complaints, []);
-    assert.match(await page.$eval(".sections", (all) => all.textContent), /1 mesh is thinned/);
+    assert.match(await page.$eval(".sections", (all) => all.textContent), /1 mesh is simplified/);
     await page.close();
   }
   context.diagnostic(`drawn after ${Math.round(best)} ms`);

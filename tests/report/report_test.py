@@ -183,7 +183,7 @@ class Reports(unittest.TestCase):
         self.assertEqual((mesh["triangles"], mesh["points"]), (2 * side * side, (side + 1) ** 2))
         self.assertLessEqual(mesh["drawnTriangles"], 250000)
         self.assertGreater(mesh["drawnTriangles"], 125000)
-        self.assertIn("1 mesh is thinned: of 320000 triangles", shot.data["notes"][0])
+        self.assertIn("1 mesh is simplified: of 320000 triangles", shot.data["notes"][0])
         whole = {tuple(struct.unpack("<f", struct.pack("<f", c))[0] for c in point)
                  for point in zip(*[iter(scenes.sheet(side)[0])] * 3)}
         self.assertTrue(all(tuple(point) in whole for point in shot.points(mesh)))
@@ -195,7 +195,7 @@ class Reports(unittest.TestCase):
         shot, = self.report(long)
         frames = shot.data["frames"]
         self.assertEqual((frames["first"], frames["step"], frames["count"]), (0, 11, 90910))
-        self.assertIn("Of its 1000001 frames the report shows every 11th", shot.data["notes"][0])
+        self.assertIn("Of the 1000001 frames the report shows every 11th", shot.data["notes"][0])
 
     def test_frames_and_takes_can_be_chosen(self):
         shot, = self.report(SHOT, "--frames", "1010:1012")
@@ -206,8 +206,8 @@ class Reports(unittest.TestCase):
             self.assertEqual(shot.channel(camera[0], name), whole.channel(camera[1], name)[9:12])
         for range_ in NO_FRAMES:
             self.assertEqual(run("report", SHOT, "-o", self.page, "--frames", range_).returncode, 2)
-        for more, reason in ((("--frames", "1:5"), "it has no frames from 1 to 5; its frames: 1001 to 1048"),
-                             (("--take", "none"), 'it has no take "none"; its takes: "Scene"')):
+        for more, reason in ((("--frames", "1:5"), "there are no frames 1 to 5; the frames are 1001 to 1048"),
+                             (("--take", "none"), 'there is no take "none"; takes: "Scene"')):
             result = run("report", SHOT, "-o", os.path.join(self.folder, "no.html"), *more)
             self.assertEqual((result.returncode, result.stderr), (1, f"tarnell-fbx: {SHOT}: {reason}\n"))
         self.assertFalse(os.path.exists(os.path.join(self.folder, "no.html")))
@@ -260,7 +260,7 @@ class Reports(unittest.TestCase):
             stream.write("mine")
         result = run("report", SHOT, "-o", self.page)
         self.assertEqual((result.returncode, result.stderr),
-                         (2, f"tarnell-fbx: {self.page}: exists and is no report; --force overwrites it\n"))
+                         (2, f"tarnell-fbx: {self.page}: exists and is not a report; --force overwrites it\n"))
         with open(self.page, encoding="utf-8") as stream:
             self.assertEqual(stream.read(), "mine")
         self.report(SHOT, "--force")

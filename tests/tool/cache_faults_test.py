@@ -42,7 +42,7 @@ class Faults(unittest.TestCase):
         """Offsets by file of what --verify finds."""
         result = [(os.path.basename(each["file"]), each["offset"], each["reason"])
                   for each in self.content(name, "--verify", status=1)["faults"]]
-        self.assertIn("caches with faults", run("cache", "--verify", self.path(name)).stderr)
+        self.assertIn("caches have faults", run("cache", "--verify", self.path(name)).stderr)
         return result
 
     def samples(self, name):
@@ -52,13 +52,13 @@ class Faults(unittest.TestCase):
     def test_a_max_cache_that_is_cut_off(self):
         self.edit("max.pc2", lambda data: data[:80])  # 32 bytes of header, samples of 36: one and a piece
         self.assertEqual(self.samples("max.pc2"), [(1, 32)])
-        self.assertEqual(self.faults("max.pc2"), [("max.pc2", 68, "cut off: 2 of 3 samples are missing")])
+        self.assertEqual(self.faults("max.pc2"), [("max.pc2", 68, "truncated: 2 of 3 samples are missing")])
         self.edit("max.pc2", lambda data: data[:20])
         self.assertEqual([each[:2] for each in self.faults("max.pc2")], [("max.pc2", 20)])
 
     def test_a_max_cache_with_more_than_it_says(self):
         self.edit("max.pc2", lambda data: data + bytes(5))
-        self.assertEqual(self.faults("max.pc2"), [("max.pc2", 140, "5 bytes behind the last sample")])
+        self.assertEqual(self.faults("max.pc2"), [("max.pc2", 140, "5 bytes after the last sample")])
 
     def test_numbers_that_are_none(self):
         nan = struct.pack("<f", float("nan"))
@@ -73,7 +73,7 @@ class Faults(unittest.TestCase):
         self.edit("wide.mcx", lambda data: data[:400])
         self.assertEqual(self.samples("wide.xml"), [(0, 200), (1, 348)])
         found = self.faults("wide.xml")
-        self.assertEqual((found[0][0], found[0][2]), ("wide.mcx", "cut off or damaged"))
+        self.assertEqual((found[0][0], found[0][2]), ("wide.mcx", "truncated or damaged"))
         self.assertEqual(found[1:], [("wide.xml", 0, "channel wave: no sample at frame 2")])
 
     def test_a_sample_whose_file_is_missing(self):

@@ -111,11 +111,11 @@ class MayaCache(Cache):
 
     def test_data_that_is_cut_off_before_the_first_sample(self):
         self.change(".mcx", lambda old: old[:60])
-        self.check_unused(r"moving\.mcx: offset \d+: cut off or damaged")
+        self.check_unused(r"moving\.mcx: offset \d+: truncated or damaged")
 
     def test_data_that_is_cut_off_in_the_last_sample(self):
         self.change(".mcx", lambda old: old[:-1])
-        self.check_unused(r"moving\.mcx: offset \d+: cut off or damaged")
+        self.check_unused(r"moving\.mcx: offset \d+: truncated or damaged")
 
     def test_data_that_is_no_cache(self):
         self.change(".mcx", lambda old: bytes(len(old)))
@@ -170,7 +170,7 @@ class MaxCache(Cache):
 
     def test_another_number_of_points(self):
         self.header(points=2)
-        self.check_unused(r"it has 2 points, the mesh has 3")
+        self.check_unused(r"it has 2 points, but the mesh has 3")
 
     def test_points_that_are_not_finite_are_named(self):
         self.change(".pc2", lambda old: old[:32 + 36] + struct.pack("<f", float("inf")) + old[32 + 40:])

@@ -203,7 +203,7 @@ class Words(unittest.TestCase):
 
     def test_of_a_plot_say_what_stands_still_in_a_line(self):
         text = run("curve", SHOT, "shotCam.FocusDistance", "--plot").stdout.splitlines()
-        self.assertEqual(text[3:], ["shotCam.FocusDistance  1000000 throughout, from frame 1001 to 1048"])
+        self.assertEqual(text[3:], ["shotCam.FocusDistance  1000000 constant, from frame 1001 to 1048"])
 
 
 class Takes(unittest.TestCase):

@@ -197,12 +197,12 @@ class Curves(Folder):
 class Meshes(Folder):
     def test_differ_in_points(self):
         other = scenes.scene(the_mesh=scenes.mesh(21, "tri", points=((0, 0, 0), (1, 3, 4), (0, 1.5, 0))))
-        found = self.only(self.diff(scenes.scene(), other), "points", "tri", "2 of 3 points, most point 1")
+        found = self.only(self.diff(scenes.scene(), other), "points", "tri", "2 of 3 points, largest difference at point 1")
         self.assertEqual((found["amount"], found["a"], found["b"]), (5, "(1, 0, 0)", "(1, 3, 4)"))
 
     def test_differ_in_topology(self):
         other = scenes.scene(the_mesh=scenes.mesh(21, "tri", corners="0,2,-2"))
-        found = self.only(self.diff(scenes.scene(), other), "topology", "tri", "corners of polygon 0")
+        found = self.only(self.diff(scenes.scene(), other), "topology", "tri", "vertices of polygon 0")
         self.assertEqual((found["a"], found["b"]), ("0, 1, 2", "0, 2, 1"))
         without = self.diff(scenes.scene(), scenes.scene(the_mesh=scenes.mesh(21, "tri", normals="")))
         self.assertEqual(self.only(without, "topology", "tri", "normals")["b"], "no")
@@ -261,14 +261,14 @@ class Materials(Folder):
         self.assertEqual((found["a"], found["b"]), ("red", "crimson"))
         new = '\tMaterial: 9, "Material::new", "" {\n\t\tVersion: 102\n\t\tShadingModel: "lambert"\n\t}\n\tTexture: 5'
         found = self.only(self.changed(("\tTexture: 5", new)), "added", "new", "material")
-        self.assertEqual((found["a"], found["b"]), (None, "on no node"))
+        self.assertEqual((found["a"], found["b"]), (None, "not assigned"))
         found = self.changed(("\tTexture: 5", new), ('C: "OO",4,2\n', 'C: "OO",4,2\n\tC: "OO",9,2\n'))
         self.assertEqual([(each["kind"], each["object"], each["what"], each["a"], each["b"]) for each in found],
-                         [("added", "new", "material", None, 'on "strip"'),
+                         [("added", "new", "material", None, 'assigned to "strip"'),
                           ("material", "strip", "materials", '"red", "glass"', '"red", "glass", "new"')])
 
     def test_are_those_of_other_polygons(self):
-        found = self.only(self.changed(("a: 1,0,1", "a: 1,1,0")), "material", "strip", "2 of 3 polygons, the first polygon 1")
+        found = self.only(self.changed(("a: 1,0,1", "a: 1,1,0")), "material", "strip", "2 of 3 polygons, the first at polygon 1")
         self.assertEqual((found["a"], found["b"]), ('"red"', '"glass"'))
         # In another order, with the indices to match: the same to look at.
         self.assertEqual(self.changed(("a: 1,0,1", "a: 0,1,0"), ('C: "OO",3,2\n\tC: "OO",4,2', 'C: "OO",4,2\n\tC: "OO",3,2')),
@@ -396,7 +396,7 @@ class Failures(Folder):
         a, b = self.file("a.fbx", text), self.file("b.fbx", text)
         result = run("diff", a, b)
         self.assertEqual((result.returncode, result.stdout), (1, ""))
-        self.assertIn("frames, and at most 16777216 are compared", result.stderr)
+        self.assertIn("frames, but at most 16777216 are compared", result.stderr)
 
     def test_name_the_file(self):
         missing = os.path.join(self.folder, "missing.fbx")

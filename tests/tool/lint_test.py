@@ -100,17 +100,17 @@ class Rules(unittest.TestCase):
 class Findings(unittest.TestCase):
     def test_name_the_object_and_the_numbers(self):
         for name, who, words in (("keys-between-frames", "cam", "1 of 5 keys between whole frames, the first at 2.25"),
-                                 ("span-differs-from-keys", "shot", "frames 0 to 10, its keys are at 0 to 4"),
+                                 ("span-differs-from-keys", "shot", "frames 0 to 10, its keys are at frames 0 to 4"),
                                  ("rotation-flips", "cam", "from 180° to −175° between frames 2 and 3"),
                                  ("film-shape-differs", "cam", "the film is 1.7778:1, the picture 0.9259:1"),
-                                 ("far-from-origin", "tri", "200000 cm from the origin, where floats are 0.0156 cm apart"),
+                                 ("far-from-origin", "tri", "200000 cm from the origin, where adjacent floats are 0.0156 cm apart"),
                                  ("lens-values-disagree", "cam", "FieldOfViewX is 90°"),
-                                 ("polygons-out-of-range", "tri", "1 corner names a point beyond the 3 that there are"),
+                                 ("polygons-out-of-range", "tri", "1 polygon vertex refers to a point beyond the 3 of the mesh"),
                                  ("cache-unusable", "tri", "4"), ("cache-range", "tri", "from frame 0 to 2"),
                                  ("cache-rate", "tri", "24 frames per second, and the file has 25"),
                                  ("duplicate-names", "twin", "2 nodes"), ("constraints", None, '"Aim"'),
                                  ("take-without-keys", "still", "nothing is keyed in the take"),
-                                 ("unparented-nodes", "stray", "it has no parent, but descendants")):
+                                 ("unparented-nodes", "stray", "it has descendants, but no parent")):
             page, _ = lint(os.path.join(DATA, name + ".fbx"), "--rules", name)
             self.assertEqual([each["object"] for each in page["findings"]], [who], name)
             self.assertIn(words, page["findings"][0]["text"])
@@ -152,10 +152,10 @@ class Findings(unittest.TestCase):
             return [(each["object"], each["text"], each["takes"]) for each in page["findings"]]
         grows = {"frames": (0, 4), "values": [1.0, 3.0]}
         self.assertEqual(found("inherited-scale", **grows),
-                         [("free", 'it leaves out the scale of its parent "big", which is keyed', ["shot"])])
+                         [("free", 'it does not inherit the scale of its parent "big", which is keyed', ["shot"])])
         self.assertEqual(found("inherited-scale", frames=(0, 4), values=[1.0, 1.0]), [])
         self.assertEqual(found("inherited-scale", frames=(0, 4), values=[3.0, 3.0]),
-                         [("free", 'it leaves out the scale of its parent "big", (3, 1, 1)', ["shot"])])
+                         [("free", 'it does not inherit the scale of its parent "big", (3, 1, 1)', ["shot"])])
         self.assertEqual(found("zero-scale", frames=(0, 4), values=[0.0, 1.0]),
                          [("big", "its scale is (0, 1, 1)", ["shot"])])
 
@@ -211,7 +211,7 @@ class Findings(unittest.TestCase):
         text = text.replace("Objects:  {\n", "Objects:  {\n" + more, 1)
         result = run("lint", "--json", "--rules", "duplicate-names", "-", input=text)
         self.assertEqual(len(json.loads(result.stdout)["findings"]), 30)
-        self.assertIn("… and 10 more; --json has all", run("lint", "--rules", "duplicate-names", "-", input=text).stdout)
+        self.assertIn("… and 10 more; --json lists all", run("lint", "--rules", "duplicate-names", "-", input=text).stdout)
 
     def test_of_files_that_cannot_be_read_are_errors(self):
         result = run("lint", "--json", os.path.join(DATA, "missing.fbx"))

@@ -148,7 +148,7 @@ class Info(Folder):
         lines = run("info", file).stdout.splitlines()
         self.assertLess(len(lines), 60)
         nodes = len(json.loads(run("tree", "--json", file).stdout)["nodes"])
-        self.assertEqual(lines[-1], f"    … and {nodes - 40} more; tarnell-fbx tree has all")
+        self.assertEqual(lines[-1], f"    … and {nodes - 40} more; tarnell-fbx tree lists all")
 
     def test_says_when_takes_begin_and_end_to_four_decimals(self):
         self.assertIn("frames 1001 to 1048  (41.7083 to 43.6667 s)", run("info", SHOT).stdout)

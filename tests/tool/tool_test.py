@@ -207,8 +207,8 @@ class Info(unittest.TestCase):
                           ("a: 7389785280,18474463200", "a: 0,3694892640"))
             page = run("info", file).stdout
         self.assertIn("Frame rate    12.5 frames per second\n", page)
-        self.assertIn("Repaired      the time mode is custom and states no frame rate; 12.5 frames per second were "
-                      "worked out from its times\n", page)
+        self.assertIn("Repaired      the time mode is custom, but states no frame rate; 12.5 frames per second were "
+                      "derived from its times\n", page)
 
     def test_takes_several_files_and_goes_on_after_a_bad_one(self):
         result = run("info", SHOT, "missing.fbx", SHOT)

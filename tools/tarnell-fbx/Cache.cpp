@@ -137,10 +137,10 @@ std::string kindText(const CacheFacts& facts) {
         return "Max point cache, " + numberText(facts.framesPerSample) +
                (facts.framesPerSample == 1.0 ? " frame per sample" : " frames per sample");
     std::string text = std::string("Maya cache, ") + (facts.wide ? "64-bit" : "32-bit") + " chunks, " +
-                       (facts.oneFile ? "all samples in one file" : "a file per sample");
+                       (facts.oneFile ? "one data file" : "one data file per sample");
     if (facts.frameRate > 0.0)
         return text + ", " + rateText(facts.frameRate);
-    return text + ", without description (frames below at 24 per second)";
+    return text + ", without description (frames at 24 per second)";
 }
 
 std::string framesText(double first, double last) { return numberText(first) + " to " + numberText(last); }
@@ -148,8 +148,8 @@ std::string framesText(double first, double last) { return numberText(first) + "
 void printChannels(const CacheFacts& facts, std::ostream& out, const Terminal& terminal) {
     const std::map<std::string, ChannelSamples> found = samplesByChannel(facts);
     Table table({{"Channel", Table::Align::left, Ink::name},
-                 {"Holds"},
-                 {"Numbers"},
+                 {"Content"},
+                 {"Type"},
                  {"Frames stated"},
                  {"Frames found"},
                  {"Samples", Table::Align::right},
@@ -199,11 +199,12 @@ void printUse(const MeshUse& use, const std::string& path, std::ostream& out, co
     out << terminal.paint(Ink::name, inQuotes(use.mesh)) << (use.active ? "" : "  (switched off)") << '\n';
     if (!use.channel.empty())
         out << "  Channel     " << inQuotes(use.channel) << '\n';
-    out << "  In the file " << (use.relative.empty() ? "no relative name" : inQuotes(use.relative)) << ", "
-        << (use.absolute.empty() ? "no absolute name" : inQuotes(use.absolute)) << '\n';
-    out << "  Found       " << (path.empty() ? "nowhere" : terminalText(path)) << '\n';
+    out << "  Paths       " << (use.relative.empty() ? "no relative path" : inQuotes(use.relative)) << ", "
+        << (use.absolute.empty() ? "no absolute path" : inQuotes(use.absolute)) << '\n';
+    out << "  File        " << (path.empty() ? "not found" : terminalText(path)) << '\n';
     if (!use.fault.empty())
-        out << "  " << terminal.paint(Ink::warning, "The mesh shows without it: " + terminalText(use.fault)) << '\n';
+        out << "  " << terminal.paint(Ink::warning, "The mesh is shown without the cache: " + terminalText(use.fault))
+            << '\n';
 }
 
 void printContent(const CacheFacts& facts, const CacheOptions& options, std::ostream& out, const Terminal& terminal) {
@@ -216,7 +217,7 @@ void printContent(const CacheFacts& facts, const CacheOptions& options, std::ost
         out << "  " << terminal.paint(Ink::warning, "Fault") << "  "
             << terminalText(fault.file + ": offset " + std::to_string(fault.offset) + ": " + fault.reason) << '\n';
     if (options.verify && facts.faults.empty())
-        out << "  Verified: all samples are there, and every number is finite\n";
+        out << "  Verified: all samples exist and all values are finite\n";
 }
 
 /// A cache that several deformers use is printed once.
@@ -230,7 +231,7 @@ void printEntries(const std::vector<CacheEntry>& entries, const CacheOptions& op
         if (shown.insert(entry.path).second) {
             printContent(entry.facts, options, out, page.terminal());
         } else {
-            out << "  As above\n";
+            out << "  Content as above\n";
         }
     }
 }
@@ -382,7 +383,7 @@ int cache(const CacheOptions& options) {
         if (!options.verify || faulty == 0)
             return kSuccess;
         printError(page.file(),
-                   std::to_string(faulty) + " of " + std::to_string(entries.size()) + " caches with faults");
+                   std::to_string(faulty) + " of " + std::to_string(entries.size()) + " caches have faults");
         return kUnreadable;
     });
 }

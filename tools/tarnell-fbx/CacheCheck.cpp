@@ -79,7 +79,7 @@ std::string mayaFault(FbxCache& cache, const char* channelName, unsigned int poi
 
 std::string maxFault(FbxCache& cache, unsigned int pointCount) {
     if (cache.GetPointCount() != pointCount)
-        return "it has " + std::to_string(cache.GetPointCount()) + " points, the mesh has " +
+        return "it has " + std::to_string(cache.GetPointCount()) + " points, but the mesh has " +
                std::to_string(pointCount);
     // Frames before zero cannot be requested.
     constexpr double kLargestFrame = INT32_MAX;
@@ -107,7 +107,7 @@ std::string cacheFault(FbxMesh& mesh) {
         return "it is switched off";
     FbxCache* cache = deformer->GetCache();
     if (!cache)
-        return "the file does not say which";
+        return "the file does not specify a cache";
     const OpenCache open(*cache);
     if (!open.isOpen())
         return open.fault();

@@ -32,7 +32,7 @@ Range rangeOf(const CameraList& list, const CameraOptions& options) {
         const Range asked{options.frames->first, options.frames->second};
         if (list.take.exists && (asked.first < range.first || asked.last > range.last))
             throw Unreadable("frames " + std::to_string(asked.first) + " to " + std::to_string(asked.last) +
-                             " were asked for, and the take has " + std::to_string(range.first) + " to " +
+                             " were requested, but the take has " + std::to_string(range.first) + " to " +
                              std::to_string(range.last));
         range = asked;
     }
@@ -40,7 +40,7 @@ Range rangeOf(const CameraList& list, const CameraOptions& options) {
     const bool printsAll = options.frames || options.form == Form::csv;
     if (printsAll && range.last - range.first >= kMostFrames)
         throw Unreadable("frames " + std::to_string(range.first) + " to " + std::to_string(range.last) +
-                         " are too many to be printed; --frames A:B picks some");
+                         " are too many to print; select some with --frames A:B");
     return range;
 }
 
@@ -52,7 +52,7 @@ void keepNamed(CameraList& list, const std::string& name) {
         known += (known.empty() ? "" : ", ") + inQuotes(camera.name);
     std::erase_if(list.cameras, [&](const CameraFacts& camera) { return camera.name != name; });
     if (list.cameras.empty())
-        throw Unreadable("it has no camera " + inQuotes(name) + "; its cameras: " + (known.empty() ? "none" : known));
+        throw Unreadable("there is no camera " + inQuotes(name) + "; cameras: " + (known.empty() ? "none" : known));
 }
 
 // ---- Text ----
@@ -113,13 +113,13 @@ void printPlace(const CameraFacts& camera, const CameraMoment& moment, Lines& li
         lines.line("Target", inQuotes(camera.target) + " at " + there);
         lines.line("Roll", rounded(moment.roll, 4) + "°");
     } else {
-        lines.line("Interest", there + (moment.looksAtInterest() ? "" : ", not where it looks"));
+        lines.line("Interest", there + (moment.looksAtInterest() ? "" : ", not in the viewing direction"));
     }
     constexpr double kTolerance = 1e-4;
     const Vector3& scale = camera.scale;
     if (std::abs(scale[0] - 1.0) > kTolerance || std::abs(scale[1] - 1.0) > kTolerance ||
         std::abs(scale[2] - 1.0) > kTolerance)
-        lines.line("Scale", vectorText(scale, 4) + ", which does not change what it sees");
+        lines.line("Scale", vectorText(scale, 4) + ", without effect on the view");
     if (camera.hasTarget)
         return;
     const auto turn = [&](const char* label, const Vector3& angles) {
@@ -143,13 +143,13 @@ void printIdle(const CameraFacts& camera, std::ostream& out, const Terminal& ter
 
 void printChannels(const CameraFacts& camera, std::ostream& out, const Terminal& terminal) {
     if (camera.movedBy)
-        out << "  " << terminal.paint(Ink::faint, "Moved along by") << ' ' << inQuotes(*camera.movedBy) << '\n';
+        out << "  " << terminal.paint(Ink::faint, "Animated ancestor") << ' ' << inQuotes(*camera.movedBy) << '\n';
     Table table({{"Keys, as in the file"},
                  {"Count", Table::Align::right},
                  {"First frame", Table::Align::right},
                  {"Last frame", Table::Align::right},
-                 {"Least", Table::Align::right, Ink::number},
-                 {"Most", Table::Align::right, Ink::number},
+                 {"Minimum", Table::Align::right, Ink::number},
+                 {"Maximum", Table::Align::right, Ink::number},
                  {"Remarks"}});
     for (const CameraChannel& channel : camera.channels)
         table.addRow({terminalText(channel.property), std::to_string(channel.keys), rounded(channel.firstFrame, 3),
@@ -175,7 +175,7 @@ void printFrames(const CameraFacts& camera, const Range& range, std::ostream& ou
 }
 
 void printOrigins(const CameraFacts& camera, std::ostream& out, const Terminal& terminal) {
-    out << "  Where this comes from\n";
+    out << "  Derivation\n";
     const auto line = [&](const std::string& what, const std::string& text) {
         out << "    " << terminal.paint(Ink::faint, terminalText(what)) << ": " << terminalText(text) << '\n';
     };
@@ -223,7 +223,7 @@ void printText(const CameraList& list, const CameraOptions& options, const Range
         printCamera(camera, options, range, out, page.terminal());
     }
     for (const std::string& warning : list.warnings)
-        out << "\n" << page.terminal().paint(Ink::warning, "Noticed: " + terminalText(warning)) << '\n';
+        out << "\n" << page.terminal().paint(Ink::warning, "Warning: " + terminalText(warning)) << '\n';
 }
 
 // ---- JSON ----

@@ -299,7 +299,7 @@ CameraList CameraReader::read(const std::string& takeName) {
     const CameraGathering gathering(mOpened, take, list.take);
     for (std::size_t i = 0; i < nodes.size(); ++i) {
         if (i >= read.count || read.objects.get()[i].getName() != nodes[i]->GetName())
-            throw Unreadable("the file changed while it was read");
+            throw Unreadable("the file was changed while it was read");
         list.cameras.push_back(
             gathering.gather(*nodes[i], std::shared_ptr<const TnFbxCamera>(read.objects, read.objects.get() + i)));
     }

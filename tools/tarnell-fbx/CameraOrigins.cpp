@@ -106,7 +106,7 @@ private:
 
     void addFilm() {
         if (mFacts.driver == LensDriver::twoAngles)
-            add(mCamera.FilmHeight, "both angles give the film its shape, and its width is believed");
+            add(mCamera.FilmHeight, "the film height follows from the film width and the two angles");
         const double width = mCamera.FilmWidth.Get(), height = mCamera.FilmHeight.Get();
         constexpr double kTolerance = 1e-3;
         if (std::abs(mCamera.FilmAspectRatio.Get() - width / height) > kTolerance)
@@ -114,7 +114,8 @@ private:
         const auto format = filmFormat(mCamera.FilmFormat.Get<FbxInt>());
         if (format && knownGate({width, height}) != format->name)
             add(mCamera.FilmFormat, std::string(format->name) + " would be " + filmText(format->film));
-        const std::string unused = "it moves or scales the image in the application that wrote it; not in these values";
+        const std::string unused =
+            "it shifts or scales the image in the application that wrote the file, but is not applied here";
         for (const char* name :
              {"OpticalCenterX", "OpticalCenterY", "FilmTranslateX", "FilmTranslateY", "FilmRollValue"})
             addUnless(0.0, name, unused);
@@ -125,9 +126,9 @@ private:
 
     void addAim() {
         if (!mFacts.hasTarget) {
-            addUnless(0.0, "Roll", "the node turns the camera; rolls count where it is turned toward a target");
+            addUnless(0.0, "Roll", "the node rotates the camera; Roll applies to cameras with a target");
         } else if (mFacts.node->LclRotation.Get() != FbxDouble3(0.0, 0.0, 0.0)) {
-            add(mFacts.node->LclRotation, "the camera is turned toward its target");
+            add(mFacts.node->LclRotation, "the target determines the rotation of the camera");
         }
     }
 
@@ -180,7 +181,7 @@ private:
         switch (mFacts.driver) {
         case LensDriver::focalLength:
             return add("Focal length",
-                       stated(mCamera.FocalLength, " mm") + ", as it is; " + mode + "focal length drives");
+                       stated(mCamera.FocalLength, " mm") + ", unchanged; " + mode + "the focal length drives");
         case LensDriver::horizontalAngle:
             return add("Focal length", formula("FieldOfView", mMoment.fovX, mMoment.film.width) + "; " + mode +
                                            "the horizontal angle drives");
@@ -189,7 +190,7 @@ private:
                                            "the vertical angle drives");
         case LensDriver::twoAngles:
             return add("Focal length", formula("FieldOfViewX", mMoment.fovX, mMoment.film.width) + "; " + mode +
-                                           "both angles drive, and FieldOfViewY gives the film its height");
+                                           "both angles drive, and FieldOfViewY determines the film height");
         }
     }
 
@@ -200,8 +201,8 @@ private:
             return each.property.compare(0, name.size(), name) == 0 &&
                    (each.property.size() == name.size() || each.property[name.size()] == '.');
         });
-        return keyed ? std::string(property.GetName().Buffer()) + " by its keys, " + shortText(property) + unit +
-                           " without them"
+        return keyed ? std::string(property.GetName().Buffer()) + " (keyed; static value " + shortText(property) +
+                           unit + ")"
                      : withUnit(property, unit);
     }
 
@@ -229,7 +230,7 @@ private:
 
     void addPicture() {
         if (mFacts.pictureAspect <= 0.0)
-            return add("Picture", "the file states no resolution: the picture is the film");
+            return add("Picture", "the file states no resolution: the picture has the shape of the film");
         std::string text = withUnit(mCamera.AspectWidth, "") + " : " + withUnit(mCamera.AspectHeight, "") +
                            " × PixelAspectRatio " + shortText(mFacts.pixelAspect) + " (" + aspectModeText() +
                            ") = " + rounded(mFacts.pictureAspect, 4) + ":1";
@@ -240,10 +241,10 @@ private:
     }
 
     std::string aspectModeText() const {
-        constexpr std::array<const char*, 5> kTexts = {"AspectRatioMode 0: a window, whose shape was this",
-                                                       "AspectRatioMode 1: a ratio", "AspectRatioMode 2: a resolution",
-                                                       "AspectRatioMode 3: the height is relative to the width",
-                                                       "AspectRatioMode 4: the width is relative to the height"};
+        constexpr std::array<const char*, 5> kTexts = {
+            "AspectRatioMode 0: the size of a window", "AspectRatioMode 1: an aspect ratio",
+            "AspectRatioMode 2: a resolution", "AspectRatioMode 3: the height is relative to the width",
+            "AspectRatioMode 4: the width is relative to the height"};
         const auto mode = static_cast<std::size_t>(mFacts.aspectMode);
         return mode < kTexts.size() ? kTexts[mode] : "AspectRatioMode " + std::to_string(mFacts.aspectMode);
     }
@@ -253,12 +254,12 @@ private:
         const bool keepsHeight = mMoment.picture.height == mMoment.film.height;
         const std::string name = gateFitName(mFacts.gateFit);
         if (mFacts.gateFit == GateFit::none)
-            return "none, all of the film counts";
+            return "none, the whole film is used";
         if (keepsWidth && keepsHeight)
-            return name + ", picture and film have one shape";
+            return name + ", picture and film have the same aspect ratio";
         return name +
-               (keepsWidth ? ", the width of the film is kept, and the picture shows "
-                           : ", the height of the film is kept, and the picture shows ") +
+               (keepsWidth ? ", the width of the film is kept and the picture covers "
+                           : ", the height of the film is kept and the picture covers ") +
                filmText(mMoment.picture) + " of the film plane";
     }
 
@@ -266,7 +267,7 @@ private:
         add("Clip planes",
             withUnit(mCamera.NearPlane, "") + ", " + withUnit(mCamera.FarPlane, "") + " in the file's unit, × " +
                 rounded(unit(), 6) + " cm" +
-                (autoPlanes() ? "; AutoComputeClipPanes is on: the application may choose its own" : ""));
+                (autoPlanes() ? "; AutoComputeClipPanes is on: the application may use other planes" : ""));
     }
 
     bool autoPlanes() const {
@@ -279,17 +280,17 @@ private:
         std::string text = stated(mFacts.node->LclTranslation, "");
         const FbxNode* parent = mFacts.node->GetParent();
         if (parent && parent->GetParent())
-            text += " below \"" + std::string(parent->GetName()) + "\" and whatever is above that";
+            text += " below \"" + std::string(parent->GetName()) + "\" and its ancestors";
         text += "; × " + rounded(unit(), 6) + " cm (" + unitName(unit()) + "); from " + axes.up + " up, " +
                 axes.toViewer + " to the viewer" +
-                (axes.up == "+Y" && axes.toViewer == "+Z" ? ", which stays" : " to +Y up");
+                (axes.up == "+Y" && axes.toViewer == "+Z" ? ", unchanged" : ", converted to +Y up");
         add("World", std::move(text));
     }
 
     void addDirection() {
         if (mFacts.hasTarget)
-            return add("Direction", "turned toward \"" + mFacts.target + "\"; its own rotation does not count");
-        std::string text = "cameras of files look along their node's +X; PreRotation " +
+            return add("Direction", "aimed at \"" + mFacts.target + "\"; the rotation of the node is ignored");
+        std::string text = "cameras in FBX files look along +X of their node; PreRotation " +
                            vectorText(mFacts.preRotation, 3) + " before and PostRotation " +
                            vectorText(mFacts.postRotation, 3) + " after the rotation are " +
                            (mFacts.rotationActive ? "in force" : "not in force (RotationActive is off)") +
@@ -298,7 +299,7 @@ private:
         EFbxRotationOrder order = eEulerXYZ;
         mFacts.node->GetRotationOrder(FbxNode::eSourcePivot, order);
         constexpr std::array<const char*, 7> kOrders = {"XYZ", "XZY", "YZX", "YXZ", "ZXY", "ZYX", "spheric XYZ"};
-        add("Rotation", stated(mFacts.node->LclRotation, " in degrees") + ", turned in the order " +
+        add("Rotation", stated(mFacts.node->LclRotation, " in degrees") + ", rotation order " +
                             (mFacts.rotationActive ? kOrders[static_cast<std::size_t>(order)] : "XYZ"));
     }
 

@@ -178,11 +178,11 @@ private:
 
     void addLosses() {
         const bool still = !cachesPoints() && mReader.getFirstFrame() < mReader.getLastFrame();
-        mLosses.add(still ? mDeforming : 0, "written as they stand at the first frame (see --frames): moving meshes");
-        mLosses.add(mSplit, "written anew for each node: moving meshes that nodes have in common");
+        mLosses.add(still ? mDeforming : 0, "written as at the first frame (see --frames): deforming meshes");
+        mLosses.add(mSplit, "written as a copy for each node: deforming meshes that several nodes share");
         mLosses.add(mWithoutPolygons, "written as points: meshes without polygons");
         if (wants("transforms")) {
-            mLosses.add(mMarkers, "written as nulls, without look, size and colour: markers");
+            mLosses.add(mMarkers, "written as nulls without look, size and colour: markers");
             mLosses.add(mBones, "written as nulls: bones");
         } else {
             mLosses.add(mMarkers, "not written: markers");
@@ -248,12 +248,12 @@ bool isOfAnotherKind(const std::string& output) {
 /// Why the output must not be written; empty when it may.
 std::string refusal(const ConvertOptions& options) {
     if (toStandardOutput(options))
-        return writesCaches(options) ? "has no place for point caches; --cache none leaves them out" : "";
+        return writesCaches(options) ? "cannot hold point caches; --cache none omits them" : "";
     if (isOfAnotherKind(options.output))
-        return "FBX files are written, under names that end with .fbx";
+        return "the name of an FBX file must end with .fbx";
     std::error_code ignored;
     if (filesystem::equivalent(options.input, options.output, ignored))
-        return "is the file that is read";
+        return "is also the input file";
     if (options.force)
         return {};
     if (filesystem::exists(options.output, ignored))

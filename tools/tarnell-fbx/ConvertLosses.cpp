@@ -63,7 +63,7 @@ public:
     void report(Losses& losses) const {
         for (const LightExtra& extra : mExtras)
             losses.add(extra.count, extra.what);
-        losses.add(mSwitchedOff, "written as switched on: lights that cast no light");
+        losses.add(mSwitchedOff, "written as switched on: lights that are switched off");
     }
 
 private:
@@ -79,8 +79,9 @@ private:
          {"not written: barn doors of lights", {"EnableBarnDoor"}},
          {"not written: inner cones of lights", {"InnerAngle"}},
          {"not written: ranges of lights", {"EnableNearAttenuation", "EnableFarAttenuation", "DecayStart"}},
-         {"not written: pictures that lights project", {"FileName"}},
-         {"not written: visible cones of lights", {"DrawVolumetricLight", "DrawGroundProjection", "Fog"}}}};
+         {"not written: images projected by lights", {"FileName"}},
+         {"not written: volumetric light, ground projection and fog of lights",
+          {"DrawVolumetricLight", "DrawGroundProjection", "Fog"}}}};
     int mSwitchedOff = 0;
 };
 
@@ -211,8 +212,8 @@ void Losses::addScene(FbxScene& scene) {
         if (entry.node->GetParent() && !isProducer(*entry.node) && !isSkewHelper(*entry.node))
             nodes.add(*entry.node);
     }
-    add(nodes.parents, "written below the root, where they are in the world: objects below others");
-    add(nodes.shared, "written anew for each node: cameras, lights and nulls that nodes have in common");
+    add(nodes.parents, "written below the root with their world transforms: objects with a parent");
+    add(nodes.shared, "written as a copy for each node: cameras, lights and nulls that several nodes share");
     if (wants("meshes")) {
         add(countOf<FbxSurfaceMaterial>(scene), "not written: materials");
         add(countOf<FbxTexture>(scene), "not written: textures");
@@ -226,18 +227,18 @@ void Losses::addScene(FbxScene& scene) {
     add(nodes.tangents, "not written: tangents and binormals of meshes");
     add(nodes.smoothing, "not written: smoothing of meshes");
     add(nodes.creases, "not written: creases and holes of meshes");
-    add(nodes.furtherCaches, "not written: caches of normals and further ones of meshes");
+    add(nodes.furtherCaches, "not written: further caches of meshes, such as those of normals");
     add(nodes.zooms, "not written: zooms of orthographic cameras");
     add(nodes.gateFits, "not written: gate fits of cameras");
     add(nodes.resolutions, "not written: resolutions of cameras");
-    add(nodes.imageShifts, "not written: optical centres, shifts, rolls and pre-scales of the images of cameras");
-    add(nodes.depthsOfField, "not written: depths of field of cameras");
+    add(nodes.imageShifts, "not written: optical centres, film translations, film rolls and pre-scales of cameras");
+    add(nodes.depthsOfField, "not written: depth of field of cameras");
     add(nodes.lights, "written as point lights: area and volume lights");
     nodes.extras.report(*this);
     add(nodes.surfaces, "written as meshes: surfaces");
     add(nodes.others, "written as nulls: curves, lines and other attributes");
     add(nodes.hidden, "written as visible: objects that are hidden or whose visibility is animated");
-    add(nodes.ownProperties, "not written: properties that users added to objects");
+    add(nodes.ownProperties, "not written: user properties");
 }
 
 namespace {

@@ -79,8 +79,8 @@ public:
             for (FbxObject* object : objects)
                 addNamed(*object, text.substr(dot + 1));
             if (!objects.empty() && !mFound)
-                throw Unreadable("\"" + text.substr(0, dot) + "\" has no property with numbers called \"" +
-                                 text.substr(dot + 1) + '"');
+                throw Unreadable("\"" + text.substr(0, dot) + "\" has no numeric property \"" + text.substr(dot + 1) +
+                                 '"');
             if (mFound)
                 return;
         }
@@ -179,8 +179,8 @@ FrameRange defaultRange(const SceneFile& file, FbxAnimStack* take, const std::ve
                            span.GetStop().GetFrameCount(file.timeMode())};
     constexpr long long kMostFrames = 1 << 20;
     if (range.last - range.first >= kMostFrames || range.last < range.first)
-        throw Unreadable("the take goes from frame " + std::to_string(range.first) + " to " +
-                         std::to_string(range.last) + "; --frames A:B picks some");
+        throw Unreadable("the take has frames " + std::to_string(range.first) + " to " + std::to_string(range.last) +
+                         "; select some with --frames A:B");
     return range;
 }
 
@@ -236,7 +236,7 @@ void printCurve(const Curves& curves, const LayerCurve& each, std::ostream& out,
     Table table({{"Frame", Table::Align::right},
                  {"Seconds", Table::Align::right},
                  {"Value", Table::Align::right, Ink::number},
-                 {"To the next"},
+                 {"Interpolation"},
                  {"Tangents"},
                  {"Left slope", Table::Align::right},
                  {"Right slope", Table::Align::right},
@@ -251,7 +251,7 @@ void printCurve(const Curves& curves, const LayerCurve& each, std::ostream& out,
 }
 
 void printSamples(const Curves& curves, const Terminal& terminal, std::ostream& out) {
-    out << "\nSamples, all layers together\n";
+    out << "\nSamples of all layers combined\n";
     std::vector<Table::Column> columns{{"Frame", Table::Align::right}, {"Seconds", Table::Align::right}};
     std::map<std::string, int> titles;
     for (const ChosenChannel& chosen : curves.channels)
@@ -277,9 +277,9 @@ void printTitle(const Curves& curves, Page& page, std::ostream& out) {
         << (curves.take ? "  take " + inQuotes(curves.take->GetName()) : "  no take") << ", "
         << rateText(curves.file.frameRate()) << ", unit "
         << unitName(curves.file.scene().GetGlobalSettings().GetSystemUnit().GetScaleFactor()) << '\n'
-        << "Values as the file has them, slopes per second.\n";
+        << "Values as stored in the file, slopes per second.\n";
     if (curves.channels.empty())
-        out << "Nothing of it is animated" << (curves.take ? " in this take" : "") << ".\n";
+        out << "Nothing is animated" << (curves.take ? " in this take" : "") << ".\n";
 }
 
 void printText(const Curves& curves, Page& page) {
@@ -312,7 +312,7 @@ void plotChannel(const Curves& curves, ChosenChannel& chosen, Page& page, std::o
     const std::string from = std::to_string(curves.range->first), to = std::to_string(curves.range->last);
     out << '\n' << page.terminal().paint(Ink::name, terminalText(chosen.fullName()));
     if (*low == *high) {
-        out << "  " << floatText(*low) << " throughout, from frame " << from << " to " << to << '\n';
+        out << "  " << floatText(*low) << " constant, from frame " << from << " to " << to << '\n';
         return;
     }
     out << "\n  ┌ " << floatText(*high) << '\n';

@@ -166,8 +166,8 @@ std::string sentenceOf(const Difference& difference) {
     if (difference.frame)
         text += " at frame " + rounded(*difference.frame, 3);
     if (difference.carried > 0)
-        text += ", and " + std::to_string(difference.carried) + (difference.carried == 1 ? " node" : " nodes") +
-                " below it along with it";
+        text += ", with " + std::to_string(difference.carried) + (difference.carried == 1 ? " node" : " nodes") +
+                " below it";
     return text;
 }
 

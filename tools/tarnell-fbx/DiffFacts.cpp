@@ -31,7 +31,7 @@ void assign(const std::vector<FbxNode*>& nodes, const FaithfulObjects<Object>& r
             objects[node] = read.objects.get() + next++;
     }
     if (next != read.count)
-        throw Unreadable("the file changed while it was read");
+        throw Unreadable("the file was changed while it was read");
 }
 
 std::vector<FbxNode*> nodesWithLights(FbxScene& scene) {

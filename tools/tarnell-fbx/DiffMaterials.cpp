@@ -85,7 +85,7 @@ private:
         constexpr std::size_t kMostFrames = 1 << 24; // as channels of the library
         if (mComparison.moments.size() > kMostFrames)
             throw Unreadable("the animation has " + std::to_string(mComparison.moments.size()) +
-                             " frames, and at most " + std::to_string(kMostFrames) + " are compared");
+                             " frames, but at most " + std::to_string(kMostFrames) + " are compared");
         std::vector<Channel> one = channelsOf(a, mComparison.a.stack), other = channelsOf(b, mComparison.b.stack);
         for (std::size_t i = 0; i < std::min(one.size(), other.size()); ++i) {
             const auto timeOf = [](double frame, const DiffSide& side) {
@@ -310,8 +310,8 @@ void compareProperties(Comparison& comparison, const FbxSurfaceMaterial& a, cons
 std::string holdersText(const FbxSurfaceMaterial& material) {
     const int count = material.GetDstObjectCount<FbxNode>();
     if (count == 0)
-        return "on no node";
-    return "on " + inQuotes(material.GetDstObject<FbxNode>(0)->GetName()) +
+        return "not assigned";
+    return "assigned to " + inQuotes(material.GetDstObject<FbxNode>(0)->GetName()) +
            (count == 1 ? "" : " and " + std::to_string(count - 1) + " more");
 }
 
@@ -351,7 +351,7 @@ public:
         if (differing > 0)
             mComparison.add(DiffKind::material, a.GetName(),
                             std::to_string(differing) + " of " + std::to_string(one.count()) +
-                                " polygons, the first polygon " + std::to_string(first),
+                                " polygons, the first at polygon " + std::to_string(first),
                             nameInQuotes(one.of(first)), nameInQuotes(other.of(first)));
     }
 

@@ -80,7 +80,7 @@ public:
         mWorst = {DiffKind::points,
                   mObject,
                   std::to_string(moved) + " of " + std::to_string(mA.getNumberOfControlPoints()) +
-                      " points, most point " + std::to_string(worst),
+                      " points, largest difference at point " + std::to_string(worst),
                   vectorText(pointOf(mA, worst, mComparison.a.unit), 4),
                   vectorText(pointOf(mB, worst, mComparison.b.unit), 4),
                   most,
@@ -118,7 +118,7 @@ private:
             for (int i = 0; same && i < size; ++i)
                 same = mA.getPointIndex(corner + i) == mB.getPointIndex(corner + i);
             if (!same)
-                return mComparison.add(DiffKind::topology, mObject, "corners of polygon " + std::to_string(polygon),
+                return mComparison.add(DiffKind::topology, mObject, "vertices of polygon " + std::to_string(polygon),
                                        cornersText(mA, corner, size),
                                        cornersText(mB, corner, mB.getPolygonVertexSize(polygon)));
             corner += size;

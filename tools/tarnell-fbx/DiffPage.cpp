@@ -86,7 +86,7 @@ void writeDiffPage(const DiffPage& page, std::ostream& out) {
         << ". Faithful values, in centimetres and with Y up; frames are those of the first "
         << "file.</p>\n<table>\n<thead><tr><th scope=\"col\">Kind</th><th scope=\"col\">Object</th>"
         << "<th scope=\"col\">What</th><th scope=\"col\">First file</th><th scope=\"col\">Second file</th>"
-        << "<th scope=\"col\">Apart</th><th scope=\"col\">Frame</th></tr></thead>\n<tbody>\n";
+        << "<th scope=\"col\">Difference</th><th scope=\"col\">Frame</th></tr></thead>\n<tbody>\n";
     for (const Difference& each : page.found)
         writeRow(each, out);
     out << "</tbody>\n</table>\n</body>\n</html>\n";

@@ -456,7 +456,7 @@ int dump(const DumpOptions& options) {
         return kUnreadable;
     }
     if (!dump.finds()) {
-        printError(options.file, "it has no object \"" + *options.name + "\" of the kinds that were asked for");
+        printError(options.file, "there is no object \"" + *options.name + "\" of the requested kinds");
         return kUnreadable;
     }
     const bool complete = dump.print();

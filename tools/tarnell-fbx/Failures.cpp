@@ -25,7 +25,7 @@ Outcome attempt(const std::function<int()>& work) {
     try {
         return {work(), {}};
     } catch (const std::bad_alloc&) {
-        return {kUnreadable, "there is not enough memory"};
+        return {kUnreadable, "not enough memory"};
     } catch (const std::exception& error) {
         return {kUnreadable, error.what()};
     }

@@ -174,7 +174,7 @@ void printTree(FbxNode& root, std::ostream& out, const Terminal& terminal) {
         pushChildren(*line.node, line.indent.size() < kMaximumIndent ? line.indent + "  " : line.indent);
     }
     if (left > 0)
-        out << "    … and " << left << " more; tarnell-fbx tree has all\n";
+        out << "    … and " << left << " more; tarnell-fbx tree lists all\n";
 }
 
 void printText(const Facts& facts, FbxNode& root, Page& page) {

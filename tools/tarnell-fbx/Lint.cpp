@@ -36,7 +36,7 @@ std::string summary(const std::vector<Finding>& findings) {
             text += (text.empty() ? "" : ", ") + std::to_string(count) + ' ' + severityName(severity) +
                     (count == 1 ? "" : "s");
     }
-    return text.empty() ? "nothing found" : text;
+    return text.empty() ? "no findings" : text;
 }
 
 // ---- Text ----
@@ -55,7 +55,7 @@ void printRule(const LintRule& rule, const LintFindings& findings, std::ostream&
             << terminalText(finding.sentence(findings.takeCount)) << '\n';
     }
     if (count > kMostShown)
-        out << "    … and " << count - kMostShown << " more; --json has all\n";
+        out << "    … and " << count - kMostShown << " more; --json lists all\n";
     out << "    " << terminal.paint(Ink::faint, rule.reason) << "\n    → " << rule.remedy << '\n';
 }
 

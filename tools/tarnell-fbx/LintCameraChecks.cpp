@@ -28,9 +28,9 @@ void lensOutOfRange(const LintContext& context, LintReport& report) {
     for (const CameraFacts& camera : context.cameras->cameras) {
         const CameraMoment moment = firstMoment(context, camera);
         if (!isPositive(moment.focalLength) && !camera.orthographic)
-            report.add(camera.name, "a focal length of " + significant(moment.focalLength, 6) + " mm is none");
+            report.add(camera.name, "the focal length is " + significant(moment.focalLength, 6) + " mm");
         if (!isPositive(moment.film.width) || !isPositive(moment.film.height))
-            report.add(camera.name, "a film of " + filmText(moment.film) + " is none");
+            report.add(camera.name, "the film is " + filmText(moment.film));
     }
 }
 
@@ -53,7 +53,7 @@ void lensValuesDisagree(const LintContext& context, LintReport& report) {
             if (extensions::isStated(row.property) && !isInForce(camera, row.property) && !isAnimated(row.property) &&
                 !camera.lensChanges && std::abs(stated - row.inForce) > row.tolerance)
                 report.add(camera.name, std::string(row.property.GetName().Buffer()) + " is " + rounded(stated, 4) +
-                                            row.unit + ", and the lens, driven by " + driverText(camera.driver) +
+                                            row.unit + ", but the lens, driven by " + driverText(camera.driver) +
                                             ", has " + rounded(row.inForce, 4) + row.unit);
         }
     }
@@ -70,11 +70,11 @@ void filmShapeDiffers(const LintContext& context, LintReport& report) {
         const std::string shapes =
             "the film is " + rounded(film, 4) + ":1, the picture " + rounded(camera.pictureAspect, 4) + ":1; gate fit ";
         if (camera.gateFit == GateFit::none) {
-            report.add(camera.name, shapes + "none leaves open which angle is kept");
+            report.add(camera.name, shapes + "none does not define which angle is kept");
             continue;
         }
-        report.add(camera.name, shapes + gateFitName(camera.gateFit) + " makes " + inDecimals(moment.fovX, 3) + "° × " +
-                                    inDecimals(moment.fovY, 3) + "° into " + inDecimals(moment.pictureFovX, 3) +
+        report.add(camera.name, shapes + gateFitName(camera.gateFit) + " changes " + inDecimals(moment.fovX, 3) +
+                                    "° × " + inDecimals(moment.fovY, 3) + "° to " + inDecimals(moment.pictureFovX, 3) +
                                     "° × " + inDecimals(moment.pictureFovY, 3) + "°");
     }
 }
@@ -123,7 +123,7 @@ void clipPlanesFarApart(const LintContext& context, LintReport& report) {
         const CameraMoment moment = firstMoment(context, camera);
         if (!camera.orthographic && isPositive(moment.nearPlane) && moment.farPlane / moment.nearPlane > kMostRatio)
             report.add(camera.name, "the far plane is " + significant(moment.farPlane / moment.nearPlane, 3) +
-                                        " times as far as the near one");
+                                        " times as far away as the near plane");
     }
 }
 
@@ -140,7 +140,7 @@ void rollWithoutTarget(const LintContext& context, LintReport& report) {
     for (const CameraFacts& camera : context.cameras->cameras) {
         if (!camera.hasTarget && attributeOf(camera).Roll.Get() != 0.0)
             report.add(camera.name, "a roll of " + rounded(attributeOf(camera).Roll.Get(), 4) +
-                                        "°, and no target: the node turns the camera");
+                                        "°, but no target: the node rotates the camera");
     }
 }
 
@@ -150,7 +150,7 @@ void interestElsewhere(const LintContext& context, LintReport& report) {
         if (!camera.hasTarget && extensions::isStated(attributeOf(camera).InterestPosition) &&
             !moment.looksAtInterest())
             report.add(camera.name, "the point of interest lies " + rounded(moment.interestAngle(), 2) +
-                                        "° off the direction it looks in");
+                                        "° off the viewing direction");
     }
 }
 
@@ -168,10 +168,10 @@ void imageShiftNotRead(const LintContext& context, LintReport& report) {
 void noResolution(const LintContext& context, LintReport& report) {
     for (const CameraFacts& camera : context.cameras->cameras) {
         if (camera.pictureAspect <= 0.0) {
-            report.add(camera.name, "a picture of " + rounded(camera.resolution[0], 3) + " × " +
-                                        rounded(camera.resolution[1], 3) + " is none");
+            report.add(camera.name, "the resolution is " + rounded(camera.resolution[0], 3) + " × " +
+                                        rounded(camera.resolution[1], 3));
         } else if (!camera.resolutionStated) {
-            report.add(camera.name, "the file states no resolution; 320 × 200 is what the format assumes");
+            report.add(camera.name, "the file states no resolution; the default of the format is 320 × 200");
         }
     }
 }

@@ -90,8 +90,8 @@ void polygonsOutOfRange(const LintContext& context, LintReport& report) {
             return (index < 0 ? -index - 1 : index) >= count; // the last corner of a polygon is negative
         });
         if (bad > 0)
-            report.add(objectName(record), countOf(bad, "corner names a point", "corners name points") +
-                                               " beyond the " + std::to_string(count) + " that there are");
+            report.add(objectName(record), countOf(bad, "polygon vertex refers", "polygon vertices refer") +
+                                               " to a point beyond the " + std::to_string(count) + " of the mesh");
     });
 }
 
@@ -104,14 +104,14 @@ void smallPolygons(const LintContext& context, LintReport& report) {
         if (small > 0)
             report.add(nameOf(*mesh), std::to_string(small) + " of " +
                                           countOf(mesh->GetPolygonCount(), "polygon", "polygons") +
-                                          " with fewer than three corners");
+                                          " with fewer than three vertices");
     }
 }
 
 void meshWithoutPolygons(const LintContext& context, LintReport& report) {
     for (const FbxMesh* mesh : context.meshes) {
         if (mesh->GetPolygonCount() == 0)
-            report.add(nameOf(*mesh), countOf(mesh->GetControlPointsCount(), "point", "points") + " and no polygon");
+            report.add(nameOf(*mesh), countOf(mesh->GetControlPointsCount(), "point", "points") + " and no polygons");
     }
 }
 
@@ -130,7 +130,7 @@ void cacheMissing(const LintContext& context, LintReport& report) {
         FbxString relative, absolute;
         used.cache->GetCacheFileName(relative, absolute);
         if (used.path.empty())
-            report.add(nameOf(*used.mesh), "there is no " + inQuotes(relative.Buffer()) + " beside the file" +
+            report.add(nameOf(*used.mesh), "there is no " + inQuotes(relative.Buffer()) + " next to the file" +
                                                (absolute.IsEmpty() ? "" : ", and no " + inQuotes(absolute.Buffer())));
     });
 }
@@ -143,7 +143,7 @@ void cacheForeignPath(const LintContext& context, LintReport& report) {
         const std::string name = absolute.Buffer();
         if (relative.IsEmpty()) {
             report.add(nameOf(*used.mesh),
-                       "the cache is named by " + inQuotes(name) + " alone, which other machines have not");
+                       "the only path of the cache is " + inQuotes(name) + ", which other machines may not have");
         } else if (!used.path.empty() && !name.empty() && !std::filesystem::exists(name, ignored)) {
             report.add(nameOf(*used.mesh),
                        "there is no " + inQuotes(name) + "; " + inQuotes(relative.Buffer()) + " was found");

@@ -151,12 +151,12 @@ void repaired(const LintContext& context, LintReport& report) {
 void oldVersion(const LintContext& context, LintReport& report) {
     constexpr int kOldestOfPeers = 7100;
     if (headerOf(context).mFileVersion < kOldestOfPeers)
-        report.add("", "the file is of version " + std::to_string(headerOf(context).mFileVersion));
+        report.add("", "the file has version " + std::to_string(headerOf(context).mFileVersion));
 }
 
 void asciiEncoding(const LintContext& context, LintReport& report) {
     if (headerOf(context).mASCII)
-        report.add("", "the file is a text");
+        report.add("", "the file is ASCII");
 }
 
 void unitShiftsOptics(const LintContext& context, LintReport& report) {
@@ -182,7 +182,7 @@ void farFromOrigin(const LintContext& context, LintReport& report) {
         const double away = lengthOf(context.worldOf(*each.node).GetT()) * context.unit();
         if (away >= kFar)
             report.add(each.node->GetName(),
-                       "it stands " + significant(away, 4) + " cm from the origin, where floats are " +
+                       "it is " + significant(away, 4) + " cm from the origin, where adjacent floats are " +
                            significant(std::exp2(std::floor(std::log2(away)) - 23.0), 3) + " cm apart");
     }
 }
@@ -191,7 +191,7 @@ void meshAtOrigin(const LintContext& context, LintReport& report) {
     for (const TreeNode& each : context.nodes) {
         const FbxAMatrix world = context.worldOf(*each.node);
         if (each.node->GetMesh() && lengthOf(world.GetT()) == 0.0 && !isOnlyScaled(world))
-            report.add(each.node->GetName(), "it is turned or mirrored, and stands exactly at the origin");
+            report.add(each.node->GetName(), "it is rotated or mirrored, and is exactly at the origin");
     }
 }
 
@@ -221,7 +221,7 @@ void shearedNode(const LintContext& context, LintReport& report) {
             most = std::max(most, lengths > 0.0 ? std::abs(dotProduct(one, other)) / lengths : 0.0);
         }
         if (most > kTolerance)
-            report.add(each.node->GetName(), "its axes are not at right angles in the world: " +
+            report.add(each.node->GetName(), "its axes are not perpendicular in the world: " +
                                                  rounded(std::acos(std::min(most, 1.0)) * 57.29577951308232, 2) + "°");
     }
 }
@@ -238,7 +238,7 @@ void inheritedScale(const LintContext& context, LintReport& report) {
         const bool leavesOut = type == FbxTransform::eInheritRrs;
         if (isKeyed || (leavesOut ? scale != FbxDouble3(1.0, 1.0, 1.0) : isUneven(scale)))
             report.add(each.node->GetName(),
-                       std::string(leavesOut ? "it leaves out" : "it takes along its own axes") +
+                       std::string(leavesOut ? "it does not inherit" : "it inherits along its own axes") +
                            " the scale of its parent " + inQuotes(parent->GetName()) + ", " +
                            (isKeyed ? "which is keyed" : vectorText({scale[0], scale[1], scale[2]}, 4)));
     }
@@ -274,7 +274,7 @@ void duplicateNames(const LintContext& context, LintReport& report) {
         ++counts[each.node->GetName()];
     for (const auto& [name, count] : counts) {
         if (count > 1 && !name.empty())
-            report.add(name, std::to_string(count) + " nodes have the name");
+            report.add(name, std::to_string(count) + " nodes have this name");
     }
 }
 
@@ -290,7 +290,7 @@ void unnamedNodes(const LintContext& context, LintReport& report) {
 void oddNames(const LintContext& context, LintReport& report) {
     for (const TreeNode& each : context.nodes) {
         if (isOdd(each.node->GetName()))
-            report.add(each.node->GetName(), "the name has control characters, or bytes that are no UTF-8");
+            report.add(each.node->GetName(), "the name has control characters or invalid UTF-8");
     }
 }
 
@@ -303,7 +303,7 @@ void unparentedNodes(const LintContext& context, LintReport& report) {
         // The platform places nodes without a parent below the root.
         if (each.depth == 0 && !isOfViews(*each.node) && !held.contains(spellingOf(*each.node, context.file.hasIds())))
             report.add(each.node->GetName(),
-                       each.node->GetChildCount() == 0 ? "it has no parent" : "it has no parent, but descendants");
+                       each.node->GetChildCount() == 0 ? "it has no parent" : "it has descendants, but no parent");
     }
 }
 
@@ -314,7 +314,7 @@ void constraints(const LintContext& context, LintReport& report) {
             ++kinds[std::string(record.value(record.valueCount() - 1).text)];
     });
     for (const auto& [kind, count] : kinds)
-        report.add("", countOf(count, "constraint", "constraints") + " of the kind " + inQuotes(kind));
+        report.add("", countOf(count, "constraint", "constraints") + " of type " + inQuotes(kind));
 }
 
 void curveThatStopsThreeJs(const LintContext& context, LintReport& report) {

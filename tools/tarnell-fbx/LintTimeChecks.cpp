@@ -26,7 +26,8 @@ void rateUnstated(const LintContext& context, LintReport& report) {
     if (context.stacks.empty())
         return;
     if (settings.GetTimeMode() == FbxTime::eDefaultMode)
-        report.add("", "the time mode is 0, the application's default; read as " + rateText(context.take.frameRate));
+        report.add("",
+                   "the time mode is 0, the default of the application; read as " + rateText(context.take.frameRate));
     for (const FbxString& warning : context.file.importer().GetFileHeaderInfo()->mWarnings) {
         const std::string text = warning.Buffer();
         if (text.find("states no frame rate") != std::string::npos)
@@ -61,8 +62,8 @@ void spanDiffersFromKeys(const LintContext& context, LintReport& report) {
         const double start = (take.keys->first - take.span->first) * take.frameRate;
         const double end = (take.keys->second - take.span->second) * take.frameRate;
         if (std::abs(start) > kHalfAFrame || std::abs(end) > kHalfAFrame)
-            report.add(take.name, "the take says frames " + framesText(*take.span, take.frameRate) +
-                                      ", its keys are at " + framesText(*take.keys, take.frameRate));
+            report.add(take.name, "the span of the take is frames " + framesText(*take.span, take.frameRate) +
+                                      ", its keys are at frames " + framesText(*take.keys, take.frameRate));
     }
 }
 
@@ -95,8 +96,8 @@ void severalTakes(const LintContext& context, LintReport& report) {
 void severalLayers(const LintContext& context, LintReport& report) {
     for (const FbxAnimStack* stack : context.stacks) {
         if (stack->GetMemberCount<FbxAnimLayer>() > 1)
-            report.add(stack->GetName(), "the take has " + std::to_string(stack->GetMemberCount<FbxAnimLayer>()) +
-                                             " layers, which add up or override each other");
+            report.add(stack->GetName(),
+                       "the take has " + std::to_string(stack->GetMemberCount<FbxAnimLayer>()) + " layers");
     }
 }
 

@@ -30,7 +30,7 @@ std::string parseFrames(const std::string& text, std::optional<std::pair<int, in
     const std::optional<int> first = wholeNumber(text.substr(0, colon));
     const std::optional<int> last = colon == std::string::npos ? first : wholeNumber(text.substr(colon + 1));
     if (!first || !last)
-        return "not a range of frames: " + text;
+        return "not a frame range: " + text;
     if (*first > *last)
         return "the range " + text + " ends before it starts";
     frames = {*first, *last};
@@ -45,7 +45,8 @@ void addCount(CLI::App& command, const char* name, int& count, int least, const 
             [name, &count, least](const std::string& text) {
                 const std::optional<int> number = wholeNumber(text);
                 if (!number || *number < least)
-                    throw CLI::ValidationError(name, "not a number from " + std::to_string(least) + " on: " + text);
+                    throw CLI::ValidationError(name,
+                                               "not a whole number of at least " + std::to_string(least) + ": " + text);
                 count = *number;
             },
             help)
@@ -57,25 +58,25 @@ void addForm(CLI::App& command, LookOptions& options, const char* name, Form for
         name,
         [name, form, &options] {
             if (options.form != Form::text)
-                throw CLI::ValidationError(name, "only one form can be printed at a time");
+                throw CLI::ValidationError(name, "only one output format can be selected");
             options.form = form;
         },
         help);
 }
 
 void addJson(CLI::App& command, LookOptions& options) {
-    addForm(command, options, "--json", Form::json, "Print JSON: an object, or an array of one per file");
+    addForm(command, options, "--json", Form::json, "Print JSON: one object, or for several files an array of them");
     addForm(command, options, "--jsonl", Form::jsonLines, "Print JSON, one line per file");
 }
 
 void addFiles(CLI::App& command, LookOptions& options, const char* help) {
     command.add_option("FILE", options.files, help)->required()->type_name("");
     addJson(command, options);
-    addCount(command, "--jobs", options.jobs, 1, "Read so many files at the same time");
+    addCount(command, "--jobs", options.jobs, 1, "Number of files to read in parallel");
 }
 
 void addTake(CLI::App& command, std::string& take) {
-    command.add_option("--take,--stack", take, "The take (animation stack) of that name instead of the first")
+    command.add_option("--take,--stack", take, "Name of the take (animation stack); default: the first")
         ->type_name("NAME");
 }
 
@@ -90,58 +91,57 @@ std::pair<CLI::App*, Options*> addCommand(CLI::App& app, std::function<int()>& c
 }
 
 void addTree(CLI::App& app, std::function<int()>& chosen) {
-    auto [command, options] = addCommand<TreeOptions>(app, chosen, "tree",
-                                                      "Show the hierarchy of the nodes, and what "
-                                                      "is attached to each",
-                                                      tree);
-    addFiles(*command, *options, "FBX files, or patterns of names");
-    addCount(*command, "--depth", options->depth, 1, "Only so many levels");
+    auto [command, options] = addCommand<TreeOptions>(
+        app, chosen, "tree", "Show the node hierarchy, with what is attached to each node", tree);
+    addFiles(*command, *options, "FBX files, or file name patterns");
+    addCount(*command, "--depth", options->depth, 1, "Maximum number of levels");
 }
 
 void addProps(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] = addCommand<PropsOptions>(app, chosen, "props", "Show the properties of an object", props);
     options->files.resize(1);
     command->add_option("FILE", options->files.front(), "The FBX file")->required()->type_name("");
-    command->add_option("OBJECT", options->object, "Name of a node, or of any other object")->required()->type_name("");
-    command->add_flag("--all", options->all, "Also those that the file leaves at the defaults of their class");
+    command->add_option("OBJECT", options->object, "Name of a node or of any other object")->required()->type_name("");
+    command->add_flag("--all", options->all,
+                      "Include properties that the file does not state, with the defaults of their class");
     addTake(*command, options->take);
     addJson(*command, *options);
 }
 
 void addCamera(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] = addCommand<CameraOptions>(
-        app, chosen, "camera", "Show lens, film, picture and place of cameras, as the application shows them", camera);
-    addFiles(*command, *options, "FBX files, or patterns of names");
-    command->add_option("--name", options->name, "Only the cameras of that name")->type_name("NAME");
-    addFrames(*command, options->frames, "Every whole frame of A:B");
+        app, chosen, "camera", "Show lens, film back, picture and placement of cameras, as in the application", camera);
+    addFiles(*command, *options, "FBX files, or file name patterns");
+    command->add_option("--name", options->name, "Only cameras with this name")->type_name("NAME");
+    addFrames(*command, options->frames, "Values at every whole frame of A:B");
     addTake(*command, options->take);
-    command->add_flag("--explain", options->explain, "Say where each number comes from");
-    addForm(*command, *options, "--csv", Form::csv, "Print comma-separated values, a line per camera and frame");
+    command->add_flag("--explain", options->explain, "Explain how each value is derived");
+    addForm(*command, *options, "--csv", Form::csv, "Print CSV, one line per camera and frame");
 }
 
 void addCurve(CLI::App& app, std::function<int()>& chosen) {
-    auto [command, options] = addCommand<CurveOptions>(
-        app, chosen, "curve", "Show the keys of an object's animated properties, and samples of them", curve);
+    auto [command, options] =
+        addCommand<CurveOptions>(app, chosen, "curve", "Show the keys and samples of animated properties", curve);
     options->files.resize(1);
     command->add_option("FILE", options->files.front(), "The FBX file")->required()->type_name("");
     command
         ->add_option("NODE", options->target,
-                     "NODE, NODE.PROPERTY or NODE.PROPERTY.X; a node answers for its camera or light, too")
+                     "NODE, NODE.PROPERTY or NODE.PROPERTY.X; a node includes its camera or light")
         ->required()
         ->type_name("");
     addFrames(*command, options->frames, "Samples at every whole frame of A:B");
     addTake(*command, options->take);
     addJson(*command, *options);
-    addForm(*command, *options, "--csv", Form::csv, "Print samples as comma-separated values, a line per frame");
-    addForm(*command, *options, "--plot", Form::plot, "Draw the curves");
+    addForm(*command, *options, "--csv", Form::csv, "Print samples as CSV, one line per frame");
+    addForm(*command, *options, "--plot", Form::plot, "Plot the curves");
 }
 
 void addCache(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] = addCommand<CacheOptions>(
-        app, chosen, "cache", "Show what point caches hold: those of an FBX file, or cache files themselves", cache);
-    addFiles(*command, *options, "FBX, .xml, .mc, .mcx and .pc2 files, or patterns of names");
-    command->add_flag("--verify", options->verify, "Read every number; a fault makes the exit status 1");
-    command->add_flag("--samples", options->samples, "Every sample with its place");
+        app, chosen, "cache", "Show the content of point caches, of an FBX file or given as cache files", cache);
+    addFiles(*command, *options, "FBX, .xml, .mc, .mcx and .pc2 files, or file name patterns");
+    command->add_flag("--verify", options->verify, "Check every value; exit with status 1 if there is a fault");
+    command->add_flag("--samples", options->samples, "List every sample with its file and offset");
 }
 
 /// A number from 0 on; the command line's own conversion accepts infinities and NaN.
@@ -150,15 +150,15 @@ std::string parseTolerance(const std::string& text, double& tolerance) {
     const char* const end = text.data() + text.size();
     const auto [rest, error] = std::from_chars(text.data(), end, number);
     if (rest != end || error != std::errc() || !std::isfinite(number) || number < 0.0)
-        return "not a number from 0 on: " + text;
+        return "not a number of at least 0: " + text;
     tolerance = number;
     return {};
 }
 
 void addDiff(CLI::App& app, std::function<int()>& chosen) {
-    auto [command, options] = addCommand<DiffOptions>(app, chosen, "diff", "Say what two files show differently", diff);
+    auto [command, options] = addCommand<DiffOptions>(app, chosen, "diff", "Compare what two files show", diff);
     command->add_option("A", options->a, "The first FBX file")->required()->type_name("");
-    command->add_option("B", options->b, "The second one; one of the two may be - for standard input")
+    command->add_option("B", options->b, "The second FBX file; one of the two may be - for standard input")
         ->required()
         ->type_name("");
     command
@@ -169,18 +169,17 @@ void addDiff(CLI::App& app, std::function<int()>& chosen) {
                 if (!complaint.empty())
                     throw CLI::ValidationError("--tolerance", complaint);
             },
-            "How far numbers may be apart, relative to the larger of 1 and them (0.0001)")
+            "Tolerance relative to the larger of 1 and the magnitude of the values (default: 0.0001)")
         ->type_name("T");
-    addFrames(*command, options->frames, "Mesh points at every whole frame of A:B instead of at the first one");
+    addFrames(*command, options->frames, "Compare mesh points at every whole frame of A:B (default: the first frame)");
     addTake(*command, options->take);
     addJson(*command, *options);
-    addForm(*command, *options, "--html", Form::html, "Print a page for a browser");
+    addForm(*command, *options, "--html", Form::html, "Print an HTML page");
     command->parse_complete_callback([a = &options->a, b = &options->b] {
         if (*a == "-" && *b == "-")
             throw CLI::ValidationError("B", "only one of the two files can be standard input");
     });
-    command->footer("Exit status: 0 the files show the same; 1 they do not, or one of them could not be read; 2 wrong "
-                    "usage.\n");
+    command->footer("Exit status: 0 no differences; 1 differences, or a file could not be read; 2 invalid usage.\n");
 }
 
 std::string unknownRule(const std::string& id) {
@@ -189,7 +188,7 @@ std::string unknownRule(const std::string& id) {
         ids.emplace_back(rule.id);
     if (std::find(ids.begin(), ids.end(), id) != ids.end())
         return {};
-    std::string answer = "there is no rule " + id;
+    std::string answer = "unknown rule " + id;
     for (const std::string& similar : mostSimilar(id, ids))
         answer += "; did you mean " + similar + '?';
     return answer;
@@ -197,17 +196,17 @@ std::string unknownRule(const std::string& id) {
 
 void addLint(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] = addCommand<LintOptions>(
-        app, chosen, "lint", "Say what tends to go wrong with a file between programs, and what to do", lint);
-    addFiles(*command, *options, "FBX files, or patterns of names");
+        app, chosen, "lint", "Report likely problems of a file in other programs, with remedies", lint);
+    addFiles(*command, *options, "FBX files, or file name patterns");
     command->get_option("FILE")->required(false);
-    command->add_option("--rules", options->rules, "Only the rules with these ids, with commas between")
+    command->add_option("--rules", options->rules, "Comma-separated list of the rules to check (default: all)")
         ->delimiter(',')
         ->type_name("LIST")
         ->allow_extra_args(false)
         ->check(unknownRule);
     command->add_flag("--list", options->list, "List the rules");
-    command->footer("Exit status: 0 nothing, or notes alone; 1 errors or warnings were found, or a file could not be "
-                    "read; 2 wrong usage.\n");
+    command->footer("Exit status: 0 no findings, or notes only; 1 errors or warnings, or a file could not be read; 2 "
+                    "invalid usage.\n");
     command->parse_complete_callback([files = &options->files, list = &options->list] {
         if (files->empty() && !*list)
             throw CLI::RequiredError("FILE");
@@ -216,30 +215,31 @@ void addLint(CLI::App& app, std::function<int()>& chosen) {
 
 void addRecords(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] = addCommand<RecordsOptions>(
-        app, chosen, "records", "Show the records that a file is made of, with the place of each", records);
-    addFiles(*command, *options, "FBX files, or patterns of names");
-    command->add_option("--path", options->path, "Only records under these names, from the top: Objects/Model")
+        app, chosen, "records", "Show the records of a file, with their offsets or lines", records);
+    addFiles(*command, *options, "FBX files, or file name patterns");
+    command
+        ->add_option("--path", options->path, "Only records with this path from the top level, such as Objects/Model")
         ->type_name("PATH");
-    addCount(*command, "--depth", options->depth, 1, "Only so many levels; deeper ones are counted");
-    addCount(*command, "--values", options->values, 0, "So many values of a list (8); 0: all");
+    addCount(*command, "--depth", options->depth, 1, "Maximum number of levels; deeper records are counted");
+    addCount(*command, "--values", options->values, 0, "Maximum number of values per list (default: 8; 0: all)");
 }
 
 #ifdef TARNELL_FBX_REPORT
 void addReport(CLI::App& app, std::function<int()>& chosen) {
-    auto [command, options] =
-        addCommand<ReportOptions>(app, chosen, "report", "Write files as one page for a browser", report);
-    command->add_option("FILE", options->files, "FBX files, or patterns of names")->required()->type_name("");
-    command->add_option("-o,--output", options->output, "The page to write; - for standard output")->type_name("PAGE");
+    auto [command, options] = addCommand<ReportOptions>(app, chosen, "report", "Write an HTML report of files", report);
+    command->add_option("FILE", options->files, "FBX files, or file name patterns")->required()->type_name("");
+    command->add_option("-o,--output", options->output, "The HTML file to write; - for standard output")
+        ->type_name("PAGE");
     addJson(*command, *options);
-    addFrames(*command, options->frames, "Only the frames from A to B");
+    addFrames(*command, options->frames, "Only the frames A to B");
     addTake(*command, options->take);
-    command->add_flag("--force", options->force, "Overwrite the page also where it is no report");
+    command->add_flag("--force", options->force, "Overwrite an existing file that is not a report");
     command->parse_complete_callback([chosenOptions = options] {
         const bool isPage = chosenOptions->form == Form::text;
         if (isPage && chosenOptions->output.empty())
             throw CLI::RequiredError("--output (or --json)");
         if (!isPage && !chosenOptions->output.empty())
-            throw CLI::ValidationError("--output", "JSON goes to standard output");
+            throw CLI::ValidationError("--output", "JSON is printed on standard output");
     });
 }
 #else
@@ -263,8 +263,8 @@ void addFrames(CLI::App& command, std::optional<std::pair<int, int>>& frames, co
 
 void addLookCommands(CLI::App& app, std::function<int()>& chosen) {
     auto [command, options] =
-        addCommand<LookOptions>(app, chosen, "info", "Show on one screen what a file holds", info);
-    addFiles(*command, *options, "FBX files, or patterns of names");
+        addCommand<LookOptions>(app, chosen, "info", "Show a summary of a file on one screen", info);
+    addFiles(*command, *options, "FBX files, or file name patterns");
     addTree(app, chosen);
     addProps(app, chosen);
     addCamera(app, chosen);

@@ -226,9 +226,8 @@ void writeManual(const CLI::App& app, std::ostream& out) {
             writeOption(option, out);
     }
     out << ".SH \"EXIT STATUS\"\n" << roff(app.get_footer()) << '\n';
-    out << ".SH ENVIRONMENT\n.TP\n.B NO_COLOR\nNo colours, also on a terminal.\n.TP\n.B COLUMNS\nThe width of pages "
-           "for "
-           "people.\n";
+    out << ".SH ENVIRONMENT\n.TP\n.B NO_COLOR\nDisables colours on terminals.\n.TP\n.B COLUMNS\nWidth of the output, "
+           "instead of that of the terminal.\n";
 }
 
 bool writeCompletion(const CLI::App& app, const std::string& shell, std::ostream& out) {

@@ -81,7 +81,7 @@ void printObject(const FbxObject& object, const PropsOptions& options, FbxAnimSt
                       flagLetters(property), keys > 0 ? std::to_string(keys) : "", described(property)});
     }
     if (table.empty()) {
-        out << "  The file states no property; --all shows those of the class.\n";
+        out << "  The file states no properties; --all shows those of the class.\n";
     } else {
         table.print(out, terminal, 2);
     }

@@ -183,7 +183,7 @@ private:
         for (const std::string& number : numbers)
             text += ' ' + number;
         if (numbers.size() < count)
-            text += " damaged: its numbers cannot be read";
+            text += " damaged: the values cannot be read";
         else if (count < value.count)
             text += " …";
         if (value.compressed)
@@ -295,7 +295,7 @@ int records(const RecordsOptions& options) {
             throw Unreadable(status.GetErrorString());
         RecordPage content(*file, options);
         if (!content.any())
-            throw Unreadable("it has no record " + options.path);
+            throw Unreadable("there is no record " + options.path);
         if (page.isJson()) {
             page.json("records", [&](JsonWriter& json) { content.printJson(json); });
         } else {

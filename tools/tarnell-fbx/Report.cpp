@@ -25,13 +25,13 @@ std::string refusal(const ReportOptions& options, const std::vector<std::string>
     std::error_code ignored;
     for (const std::string& file : files) {
         if (filesystem::equivalent(file, options.output, ignored))
-            return "is a file that is read";
+            return "is also an input file";
     }
     if (options.force || !filesystem::exists(options.output, ignored))
         return {};
     std::string start(ReportPage::mark().size(), '\0');
     std::ifstream(options.output, std::ios::binary).read(start.data(), static_cast<std::streamsize>(start.size()));
-    return start == ReportPage::mark() ? "" : "exists and is no report; --force overwrites it";
+    return start == ReportPage::mark() ? "" : "exists and is not a report; --force overwrites it";
 }
 
 /// A file that appears under its name when it is complete, or not at all.

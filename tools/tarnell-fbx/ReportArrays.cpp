@@ -7,7 +7,7 @@
 
 namespace tool {
 
-static_assert(std::endian::native == std::endian::little, "arrays are written as they stand in memory");
+static_assert(std::endian::native == std::endian::little, "arrays are written in the byte order of the machine");
 
 void ReportArrays::write(std::ostream& out) const {
     constexpr const char* kDigits = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";

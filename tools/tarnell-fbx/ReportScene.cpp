@@ -142,9 +142,9 @@ void ReportScene::boundFrames(const ReportWishes& wishes) {
     const long long all = last - first + 1;
     if (wishes.frames) {
         if (wishes.frames->first > last || wishes.frames->second < first)
-            throw Unreadable("it has no frames from " + std::to_string(wishes.frames->first) + " to " +
-                             std::to_string(wishes.frames->second) + "; its frames: " + std::to_string(first) + " to " +
-                             std::to_string(last));
+            throw Unreadable("there are no frames " + std::to_string(wishes.frames->first) + " to " +
+                             std::to_string(wishes.frames->second) + "; the frames are " + std::to_string(first) +
+                             " to " + std::to_string(last));
         first = std::max<long long>(first, wishes.frames->first);
         last = std::min<long long>(last, wishes.frames->second);
         // between two samples there is none
@@ -165,8 +165,8 @@ void ReportScene::boundFrames(const ReportWishes& wishes) {
     mFrames.step = mSampleStep * stride;
     mFrames.count = static_cast<int>((last - first) / mFrames.step + 1);
     if (mFrames.step > 1)
-        note("Of its " + std::to_string(all) + " frames the report shows every " + std::to_string(mFrames.step) +
-             "th: all of them would be too many for a page (--frames picks a part).");
+        note("Of the " + std::to_string(all) + " frames the report shows every " + std::to_string(mFrames.step) +
+             "th, to limit the size of the page (--frames selects a part).");
 }
 
 template <class Object>
@@ -195,7 +195,7 @@ void ReportScene::readEvery(int step, int frame) {
 template <class Object>
 Object* ReportScene::next(Objects<Object>& objects, const FbxNode& node) {
     if (objects.next == objects.count || objects.array.get()[objects.next].getName() != node.GetName())
-        throw Unreadable(std::string("its objects cannot be told apart: ") + node.GetName());
+        throw Unreadable(std::string("the objects that were read do not match the nodes: ") + node.GetName());
     return objects.array.get() + objects.next++;
 }
 
@@ -255,12 +255,12 @@ void ReportScene::thinShapes(const Objects<TnFbxMesh>& meshes) {
         thinned += shape.mesh.isThinned() ? 1U : 0U;
     }
     if (thinned > 0)
-        note(counted(thinned, "mesh is", "meshes are") + " thinned: of " + std::to_string(triangles) +
-             " triangles of the file the page draws about " + std::to_string(kMostTriangles) +
-             ". Points that are drawn stand where they are in the file.");
+        note(counted(thinned, "mesh is", "meshes are") + " simplified: of " + std::to_string(triangles) +
+             " triangles in the file, the page draws about " + std::to_string(kMostTriangles) +
+             ". Drawn points keep their positions.");
     if (dropped > 0)
         note(counted(static_cast<std::size_t>(dropped), "polygon is", "polygons are") +
-             " not drawn: they name points that there are not, or that are not finite.");
+             " not drawn: they refer to points that do not exist or are not finite.");
 }
 
 void ReportScene::readShapes() {
@@ -299,8 +299,8 @@ void ReportScene::readMovingPoints(const std::vector<int>& wanted) {
         return;
     mShapeFrames = wanted;
     if (wanted.size() < static_cast<std::size_t>(mFrames.count))
-        note("Meshes that change their form are exact at " + std::to_string(wanted.size()) + " of " +
-             std::to_string(mFrames.count) + " frames; between them their points move on straight lines.");
+        note("Deforming meshes are exact at " + std::to_string(wanted.size()) + " of " + std::to_string(mFrames.count) +
+             " frames; between these, points are interpolated linearly.");
 }
 
 } // namespace tool

@@ -40,7 +40,7 @@ FbxAnimStack* SceneFile::chooseTake(const std::string& name) const {
         }
         known += std::string(known.empty() ? "\"" : ", \"") + stack->GetName() + '"';
     }
-    throw Unreadable("it has no take \"" + name + "\"; its takes: " + (known.empty() ? "none" : known));
+    throw Unreadable("there is no take \"" + name + "\"; takes: " + (known.empty() ? "none" : known));
 }
 
 } // namespace tool

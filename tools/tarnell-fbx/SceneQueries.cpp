@@ -117,7 +117,7 @@ std::string unknownObject(FbxScene& scene, const std::string& name) {
     std::string similar;
     for (const std::string& each : mostSimilar(name, names))
         similar += (similar.empty() ? "; similar: \"" : ", \"") + each + '"';
-    return "it has no object \"" + name + '"' + similar;
+    return "there is no object \"" + name + '"' + similar;
 }
 
 void printId(const FbxObject& object, bool hasIds, JsonWriter& json) {

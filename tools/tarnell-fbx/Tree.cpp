@@ -149,7 +149,7 @@ void printText(const std::vector<TreeNode>& nodes, int depth, Page& page) {
         if (depth > 0 && node.depth >= depth)
             continue;
         if (node.isDetached && !toldDetached)
-            out << "Outside of the tree, as the views of applications are:\n";
+            out << "Outside the hierarchy, such as the views of applications:\n";
         toldDetached = node.isDetached;
         const int folded = depth > 0 && node.depth + 1 == depth ? countBelow(nodes, i) : 0;
         printNode(branches.before(node), *node.node, folded, out, terminal);

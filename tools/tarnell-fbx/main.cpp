@@ -51,7 +51,7 @@ std::vector<std::string> parseKinds(const std::string& text, const std::vector<s
         const std::size_t end = std::min(text.find(',', start), text.size());
         const std::string kind = text.substr(start, end - start);
         if (std::find(known.begin(), known.end(), kind) == known.end())
-            throw CLI::ValidationError("--kind", "no such kind: \"" + kind + '"');
+            throw CLI::ValidationError("--kind", "unknown kind: \"" + kind + '"');
         kinds.push_back(kind);
         start = end + 1;
     }
@@ -63,32 +63,33 @@ void addDump(CLI::App& app, tool::DumpOptions& options) {
     dump->add_option("FILE", options.file, "The FBX file; - for standard input")->required();
     dump->add_option_function<std::string>(
             "--kind", [&options](const std::string& text) { options.kinds = parseKinds(text, tool::dumpKinds()); },
-            "Comma list of cameras, lights, markers, nulls, transforms, meshes (default: all six)")
+            "Comma-separated list of cameras, lights, markers, nulls, transforms, meshes (default: all)")
         ->type_name("LIST");
-    dump->add_flag("--local", options.local, "Local transforms instead of global ones");
+    dump->add_flag("--local", options.local, "Local instead of global transforms");
     dump->add_option("--frame", options.frame, "Frame at which static values and meshes are read")
         ->check(refuseUnlessFinite);
-    tool::addFrames(*dump, options.frames, "A:B, meshes are read at every whole frame of the range");
-    dump->add_option("--sample-fps", options.sampleFps, "Sample at this many frames per second")
+    tool::addFrames(*dump, options.frames, "Read meshes at every whole frame of A:B");
+    dump->add_option("--sample-fps", options.sampleFps, "Sample rate in frames per second")
         ->check(refuseUnlessFinite)
         ->check(CLI::PositiveNumber);
     dump->add_flag_callback(
         "--no-transform-points", [&options] { options.transformPoints = false; },
-        "Leave mesh points in the node's space, those of skins in the world");
+        "Keep mesh points in the space of their node, skinned ones in world space");
     dump->add_flag("--compute-camera-rotation", options.computeCameraRotation,
-                   "Compute the rotation of cameras without target from their interest");
-    dump->add_option("--name", options.name, "Only the object of that name");
+                   "Compute the rotation of cameras without target from their point of interest");
+    dump->add_option("--name", options.name, "Only the object with this name");
     dump->add_flag_callback(
-        "--no-samples", [&options] { options.samples = false; }, "Leave the sample arrays out");
-    dump->add_flag("--pretty", options.pretty, "Indented");
+        "--no-samples", [&options] { options.samples = false; }, "Omit the sample arrays");
+    dump->add_flag("--pretty", options.pretty, "Indent the output");
     CLI::Option* faithful =
-        dump->add_flag("--faithful", options.faithful, "What the application shows instead of what hosts rely on");
-    dump->add_option("--take,--stack", options.stack, "The animation stack to read (default: the first one)")
+        dump->add_flag("--faithful", options.faithful,
+                       "Read what the application shows, not the compatible values that older hosts rely on");
+    dump->add_option("--take,--stack", options.stack, "Name of the take (animation stack); default: the first")
         ->needs(faithful);
 }
 
 void addConvert(CLI::App& app, tool::ConvertOptions& options) {
-    CLI::App* convert = app.add_subcommand("convert", "Write what a file shows into another FBX file");
+    CLI::App* convert = app.add_subcommand("convert", "Convert a file to another version, encoding or frame rate");
     convert->add_option("IN", options.input, "The FBX file to read; - for standard input")->required();
     convert->add_option("OUT", options.output, "The FBX file to write; - for standard output")->required();
     convert
@@ -98,7 +99,7 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
                 const std::vector<std::string> years = {"2010", "2011", "2012", "2013", "2014", "2016"};
                 const auto found = std::find(years.begin(), years.end(), text);
                 if (found == years.end())
-                    throw CLI::ValidationError("--version", "no such version: " + text);
+                    throw CLI::ValidationError("--version", "unknown version: " + text);
                 options.version = static_cast<int>(found - years.begin());
             },
             "2010, 2011, 2012, 2013, 2014 or 2016 (default)")
@@ -114,26 +115,26 @@ void addConvert(CLI::App& app, tool::ConvertOptions& options) {
             [&options](const std::string& text) {
                 options.kinds = parseKinds(text, {"cameras", "lights", "nulls", "transforms", "meshes"});
             },
-            "Comma list of cameras, lights, nulls, transforms, meshes (default: all)")
+            "Comma-separated list of cameras, lights, nulls, transforms, meshes (default: all)")
         ->type_name("LIST");
-    convert->add_option("--take,--stack", options.stack, "The animation stack to write (default: the first one)");
-    tool::addFrames(*convert, options.frames, "Points of meshes at every whole frame of A:B, as point caches");
-    convert->add_option("--fps", options.fps, "Sample and write at this many frames per second")
+    convert->add_option("--take,--stack", options.stack, "Name of the take (animation stack); default: the first");
+    tool::addFrames(*convert, options.frames, "Write the points of meshes at every whole frame of A:B as point caches");
+    convert->add_option("--fps", options.fps, "Frame rate to sample and write at, in frames per second")
         ->check(refuseUnlessFinite)
         ->check(CLI::PositiveNumber);
     const std::map<std::string, tool::PointCache> caches = {
         {"maya", tool::PointCache::maya}, {"max", tool::PointCache::max}, {"none", tool::PointCache::none}};
-    convert->add_option("--cache", options.cache, "Form of the point caches: maya (default), max, none")
+    convert->add_option("--cache", options.cache, "Point cache format: maya (default), max, none")
         ->transform(CLI::CheckedTransformer(caches).description(""))
         ->type_name("FORM");
-    convert->add_flag("--local", options.local, "Local transforms instead of global ones");
-    convert->add_flag("--force", options.force, "Overwrite what is there already");
-    convert->add_flag("--strict", options.strict, "Exit with status 3 when not everything came over");
+    convert->add_flag("--local", options.local, "Local instead of global transforms");
+    convert->add_flag("--force", options.force, "Overwrite existing files");
+    convert->add_flag("--strict", options.strict, "Exit with status 3 if anything is lost");
 }
 
-constexpr const char* kStatuses =
-    "Exit status: 0 all is well; 1 something could not be read or written, or lint, diff or the check of a cache found "
-    "something; 2 wrong usage; 3 done, but with --strict: not everything came over.\n";
+constexpr const char* kStatuses = "Exit status: 0 success; 1 something could not be read or written, lint found errors "
+                                  "or warnings, diff found differences, or cache found faults while verifying; 2 "
+                                  "invalid usage; 3 with --strict: the file was written, but something was lost.\n";
 
 /// The first word, when it is no option; an unknown command gets a message of its own.
 std::string unknownCommand(const CLI::App& app, const std::string& word) {
@@ -143,12 +144,12 @@ std::string unknownCommand(const CLI::App& app, const std::string& word) {
     if (word.empty() || word.front() == '-' || std::find(names.begin(), names.end(), word) != names.end())
         return {};
     if (word == "report")
-        return "this build has no reports: it was made without npm";
-    std::string answer = "there is no command \"" + word + '"';
+        return "report is not available: the tool was built without npm";
+    std::string answer = "unknown command \"" + word + '"';
     const std::vector<std::string> similar = tool::mostSimilar(word, names);
     for (std::size_t i = 0; i < similar.size(); ++i)
         answer += (i == 0 ? "; did you mean " : " or ") + similar[i];
-    return answer + (similar.empty() ? "; tarnell-fbx help lists them" : "?");
+    return answer + (similar.empty() ? "; see tarnell-fbx help" : "?");
 }
 
 /// Prints the help of the tool, or of the command in the second word.
@@ -175,14 +176,14 @@ void addSources(CLI::App& app, std::function<int()>& chosen) {
             return tool::kSuccess;
         };
     });
-    CLI::App* completion = app.add_subcommand("completion", "Print what completes command lines in a shell");
+    CLI::App* completion = app.add_subcommand("completion", "Print the completion script for a shell");
     completion
         ->add_option_function<std::string>(
             "SHELL",
             [&app, &chosen](const std::string& shell) {
                 std::ostringstream text;
                 if (!tool::writeCompletion(app, shell, text))
-                    throw CLI::ValidationError("SHELL", "no completions for " + shell + "; for bash, zsh and fish");
+                    throw CLI::ValidationError("SHELL", "no completions for " + shell + "; supported: bash, zsh, fish");
                 chosen = [text = std::move(text).str()]() -> int {
                     std::cout << text;
                     return tool::kSuccess;
@@ -200,7 +201,7 @@ void takeStandardInput(std::string& file) {
 }
 
 int run(int argc, char** argv) {
-    CLI::App app("Looks into FBX files and writes them", "tarnell-fbx");
+    CLI::App app("Inspect, compare and convert FBX files", "tarnell-fbx");
     app.require_subcommand(1);
     app.footer(kStatuses);
     app.set_version_flag("--version", std::string("tarnell-fbx ") + TARNELL_FBX_VERSION);

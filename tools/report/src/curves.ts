@@ -81,7 +81,7 @@ export class Curves {
       this.element.append(figure);
       this.plots.push(this.plot(canvas, animated.map(([, label]) => label), samples));
     }
-    if (this.plots.length === 0) this.element.append(make("p", { class: "empty" }, "Nothing of it is animated."));
+    if (this.plots.length === 0) this.element.append(make("p", { class: "empty" }, "Nothing is animated."));
   }
 
   private plot(parent: HTMLElement, labels: string[], samples: Float32Array[]): uPlot {

@@ -22,18 +22,18 @@ const SWITCHES: [what: keyof Visible, label: string][] = [
   ["grid", "Grid and axes"],
   ["names", "Names"],
   ["safe", "Safe areas"],
-  ["wires", "Wires"],
+  ["wires", "Wireframe"],
 ];
 const KEYS: [keys: string, what: string][] = [
   ["Space", "play and pause"],
-  ["← →", "a frame back, a frame on; with Shift, ten"],
+  ["← →", "previous or next frame; with Shift, ten frames"],
   ["Home End", "first and last frame"],
-  ["0, F", "from outside, all of the scene"],
+  ["0, F", "outside view, framing the whole scene"],
   ["1 … 9", "look through a camera"],
-  ["W A S D", "turn the scene"],
-  ["+ −", "closer, farther away"],
+  ["W A S D", "orbit"],
+  ["+ −", "zoom in or out"],
   ["G", "grid and axes"],
-  ["T", "dark or light"],
+  ["T", "dark or light theme"],
   ["?", "this list"],
 ];
 
@@ -110,7 +110,7 @@ class Page {
       header.append(picker);
     }
     header.append(
-      pressed("Dark or light", () => this.switchTheme()),
+      pressed("Dark or light theme", () => this.switchTheme()),
       pressed("Print", () => window.print()),
       pressed("Keys", () => this.help.showModal()),
     );
@@ -133,12 +133,12 @@ class Page {
     document.title = `${name} — FBX report`;
     this.title.replaceChildren(make("bdi", {}, name), ...(data.take ? [make("span", { class: "quiet" }, " ", make("bdi", {}, shown(data.take)))] : []));
     const cameras = this.store.cameras().map((i) => make("option", { value: String(i) }, `Through ${shown(this.store.node(i)!.name)}`));
-    this.cameraPicker.replaceChildren(make("option", { value: "-1" }, "From outside"), ...cameras);
+    this.cameraPicker.replaceChildren(make("option", { value: "-1" }, "Outside view"), ...cameras);
     const left = notes(this.store);
     this.sections.replaceChildren(
       section("Cameras", cameraTable(this.store)),
       section("Findings", findings(this.store)),
-      ...(left ? [section("What this page leaves out", left)] : []),
+      ...(left ? [section("Limits of this page", left)] : []),
       section("Meshes", meshTable(this.store)),
       section("File", fileFacts(this.store)),
     );

@@ -61,8 +61,8 @@ function cameraRows(store: Store, node: NodeData): Row[] {
     ? [{ key: "orthoWidth", label: "Picture width", value: `${number(optics.orthoWidth)} cm` }]
     : [
         { key: "focalLength", label: "Focal length", value: `${number(optics.focalLength, 4)} mm` },
-        { key: "filmAngles", label: "View of film", value: degrees(optics.filmAngles.width, optics.filmAngles.height) },
-        { key: "pictureAngles", label: "View of picture", value: degrees(optics.pictureAngles.width, optics.pictureAngles.height) },
+        { key: "filmAngles", label: "FOV of film", value: degrees(optics.filmAngles.width, optics.filmAngles.height) },
+        { key: "pictureAngles", label: "FOV of picture", value: degrees(optics.pictureAngles.width, optics.pictureAngles.height) },
       ];
   return [
     { key: "projection", label: "Projection", value: drivesWhat(node) },
@@ -146,7 +146,7 @@ export function cameraTable(store: Store): HTMLElement {
     ];
   });
   if (rows.length === 0) return make("p", { class: "empty" }, "The file has no cameras.");
-  return table("Cameras", ["Camera", "Lens", "Film back", "View of picture", "Aspect", "Curves in the file"], rows);
+  return table("Cameras", ["Camera", "Lens", "Film back", "FOV of picture", "Aspect", "Curves in the file"], rows);
 }
 
 export function fileFacts(store: Store): HTMLElement {
@@ -158,12 +158,12 @@ export function fileFacts(store: Store): HTMLElement {
   return facts([
     ["Version", `${version}, ${info.encoding === "ascii" ? "ASCII" : "binary"}${info.bytes === null ? "" : `, ${size(info.bytes)}`}`],
     ["Creator", shown(info.creator) || "not stated"],
-    ["Unit", `${shown(info.unit.name)}; this page has centimetres`],
-    ["Axes", `${info.axes.up} up, ${info.axes.toViewer} to the viewer, ${info.axes.handedness}-handed; this page has +Y up`],
+    ["Unit", `${shown(info.unit.name)}; shown in centimetres`],
+    ["Axes", `${info.axes.up} up, ${info.axes.toViewer} to the viewer, ${info.axes.handedness}-handed; shown with +Y up`],
     ["Rate", `${number(info.frameRate)} frames per second`],
     ["Takes", ...(stacks.length > 0 ? stacks : ["none"])],
     ["Nodes", Object.entries(info.nodes).map(([kind, count]) => `${count} × ${kind}`).join(", ") || "none"],
-    ["Frames here", counted(frames.count, "frame", "frames") + (frames.step > 1 ? `, every ${frames.step}th` : "")],
+    ["Frames shown", counted(frames.count, "frame", "frames") + (frames.step > 1 ? `, every ${frames.step}th` : "")],
   ]);
 }
 
@@ -173,7 +173,7 @@ export function meshTable(store: Store): HTMLElement {
   const rows = nodes.flatMap((node): Cell[][] => {
     const mesh = node.mesh === undefined ? undefined : meshes[node.mesh];
     if (!mesh) return [];
-    const drawn = mesh.drawnTriangles < mesh.triangles ? `${number((100 * mesh.drawnTriangles) / mesh.triangles, 1)} % (thinned)` : "all";
+    const drawn = mesh.drawnTriangles < mesh.triangles ? `${number((100 * mesh.drawnTriangles) / mesh.triangles, 1)} % (simplified)` : "all";
     return [[nameText(node.name), mesh.points.toLocaleString("en"), mesh.polygons.toLocaleString("en"), mesh.polygons > 0 ? drawn : "no polygons"]];
   });
   if (rows.length === 0) return make("p", { class: "empty" }, "The file has no meshes.");
@@ -193,7 +193,7 @@ function finding(rule: FindingData): HTMLElement {
     { class: `finding ${rule.severity}` },
     make("strong", {}, rule.severity),
     ` ${rule.rule} `,
-    make("ul", {}, ...objects, ...(more > 0 ? [make("li", {}, `… and ${more} more; lint --json has all`)] : [])),
+    make("ul", {}, ...objects, ...(more > 0 ? [make("li", {}, `… and ${more} more; lint --json lists all`)] : [])),
     make("p", { class: "quiet" }, `${rule.reason} → ${rule.remedy}`),
   );
 }
@@ -203,7 +203,7 @@ export function findings(store: Store): HTMLElement {
   const { findings: all, warnings } = store.shot.data;
   const worst = ["error", "warning", "note"];
   const ordered = [...all].sort((a, b) => worst.indexOf(a.severity) - worst.indexOf(b.severity));
-  if (all.length + warnings.length === 0) return make("p", { class: "empty" }, "Nothing was found.");
+  if (all.length + warnings.length === 0) return make("p", { class: "empty" }, "No findings.");
   return make("ul", { class: "findings" }, ...ordered.map(finding), ...warnings.map((warning) => make("li", {}, shown(warning))));
 }
 
@@ -212,7 +212,7 @@ export function explanation(node: NodeData | undefined): HTMLElement | undefined
   const { origins = [], idle = [] } = node?.camera ?? {};
   if (origins.length + idle.length === 0) return undefined;
   const idleList = idle.length > 0 ? [make("p", {}, "In the file, not in force:"), list(idle.map(shown))] : [];
-  return make("details", {}, make("summary", {}, "Where these numbers come from"), list(origins.map(shown)), ...idleList);
+  return make("details", {}, make("summary", {}, "Derivation of these values"), list(origins.map(shown)), ...idleList);
 }
 
 export function notes(store: Store): HTMLElement | undefined {

@@ -61,7 +61,7 @@ export class View {
     try {
       this.renderer = new WebGLRenderer({ canvas: this.canvas, antialias: true, preserveDrawingBuffer: true, logarithmicDepthBuffer: true });
     } catch {
-      this.element.replaceChildren(make("p", { class: "empty" }, "This browser has no WebGL: the scene cannot be drawn. All numbers are there."));
+      this.element.replaceChildren(make("p", { class: "empty" }, "This browser has no WebGL: the scene cannot be drawn. All values are listed."));
     }
     this.scene.add(this.surfaces.group, this.lines.object, new AmbientLight(0xffffff, 1.4), this.head, this.head.target);
     if (this.renderer) {
@@ -290,7 +290,7 @@ export class View {
   private tellStatus(): void {
     const node = this.store.node(this.store.camera);
     if (!node?.camera) {
-      this.status.textContent = "Drag to turn, right button to move, wheel to zoom.";
+      this.status.textContent = "Drag to orbit, right button to pan, wheel to zoom.";
       delete this.status.dataset["position"];
       delete this.status.dataset["direction"];
       return;
