@@ -14,7 +14,7 @@
 namespace Tarnell::Fbx {
 namespace {
 
-TEST(LastWarnings, StartAnewWithTheOutermostCallAndSayEachThingOnce) {
+TEST(LastWarnings, StartOverWithTheOutermostCallAndHaveNoDuplicates) {
     {
         const detail::CallScope facade;
         detail::warn("first");

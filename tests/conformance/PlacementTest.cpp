@@ -92,7 +92,7 @@ TEST(Placement, AtTheOriginHasAnglesThatScalesBend) {
     expectPoint(placementAtOrigin(doubled).rotation, {90, 0, 0}, kSingle); // 2 · 0.5 is 1
 }
 
-TEST(Placement, IsHandedOutAsAHostRebuildsIt) {
+TEST(Placement, IsReturnedAsAHostRebuildsIt) {
     const Matrix12 matrix = product(turned({0, 0, 45}), scaled({2, 1, 1}));
     expectMatrix(handedOut(matrix, false), matrix);
     expectMatrix(handedOut(matrix, true), product(turned({0, 0, 63.4349488229}), scaled({2, 1, 1})), 1e-6);

@@ -143,7 +143,7 @@ TEST(FaithfulLight, ShinesAlongMinusZWhateverItsType) {
     }
 }
 
-TEST(FaithfulSizes, AreThoseOfTheFrameAndSaidToBeAnimated) {
+TEST(FaithfulSizes, AreThoseOfTheFrameAndReportedAsAnimated) {
     TestScene scene(0, 10);
     fbxsdk::FbxNode* node = scene.add<fbxsdk::FbxNull>("null");
     scene.key(node->GetNull()->Size, nullptr, {{0, 10.0f}, {10, 20.0f}});

@@ -84,7 +84,7 @@ TEST(FaithfulReading, KeepsTheStackAndTheFramesWhenOthersCannotBeSelected) {
     }
 }
 
-TEST(FaithfulReading, FailsForASampleRateOrAFrameThatIsNone) {
+TEST(FaithfulReading, FailsForAnInvalidSampleRateOrFrame) {
     TnFbxReadInfo info = stackNamed("");
     TnFbxNull* nulls = nullptr;
     int count = 0;
@@ -96,7 +96,7 @@ TEST(FaithfulReading, FailsForASampleRateOrAFrameThatIsNone) {
     EXPECT_FALSE(Fbx().getNulls(info, &nulls, count));
 }
 
-TEST(FaithfulReading, SamplesAtTheRateAskedForAtTheirTrueTimes) {
+TEST(FaithfulReading, SamplesAtTheRequestedRateAtTheTrueTimes) {
     TestScene scene(0, 24);
     scene.key(scene.addNode("mover")->LclTranslation, "X", {{0, 0.0f}, {24, 24.0f}}); // one a frame of 24 per second
     const SavedScene saved(scene);
@@ -155,7 +155,7 @@ TEST(FaithfulReading, GoesOnFromFrameToFrameWhereAParentTurns) {
     }
 }
 
-TEST(FaithfulReading, HandsOutAMirroredScaleAndTheOrderInForce) {
+TEST(FaithfulReading, ReturnsAMirroredScaleAndTheOrderInForce) {
     TestScene scene;
     fbxsdk::FbxNode* node = scene.addNode("mirrored");
     node->LclScaling.Set(fbxsdk::FbxDouble3(1.0, 1.0, -2.0));

@@ -412,7 +412,7 @@ TEST(FaithfulWriting, CountsTelevisionRatesByTheirFractions) {
     EXPECT_NEAR(start, 1001.0f, 1e-3f);
 }
 
-TEST(FaithfulWriting, HasNothingThatNobodyAskedFor) {
+TEST(FaithfulWriting, HasNothingThatWasNotRequested) {
     for (int version = 0; version < 6; ++version) {
         FaithfulFile file(static_cast<Version>(version), /*ascii*/ true);
         TnFbxNull null;
@@ -582,7 +582,7 @@ TEST(FaithfulWriting, WritesMeshesWithoutPolygons) {
     }
 }
 
-TEST(FaithfulWriting, TellsObjectsOfOneNameApartInTheOldestVersion) {
+TEST(FaithfulWriting, DistinguishesObjectsOfOneNameInTheOldestVersion) {
     for (const auto version : {TnFbxWriteInfo::kFbxVersion2010, TnFbxWriteInfo::kFbxVersion2011}) {
         FaithfulFile file(version);
         TnFbxNull a, b;
@@ -605,7 +605,7 @@ TEST(FaithfulWriting, TellsObjectsOfOneNameApartInTheOldestVersion) {
     }
 }
 
-TEST(FaithfulWriting, SaysWhatFilesHaveNoPlaceFor) {
+TEST(FaithfulWriting, ReportsWhatFilesCannotExpress) {
     FaithfulFile file;
     TnFbxLight light;
     light.setName("light");
@@ -616,7 +616,7 @@ TEST(FaithfulWriting, SaysWhatFilesHaveNoPlaceFor) {
     EXPECT_NE(file.warningText().find("pivots"), std::string::npos);
 }
 
-TEST(FaithfulWriting, WritesTheKindsThatWereAskedForOnly) {
+TEST(FaithfulWriting, WritesTheRequestedKindsOnly) {
     FaithfulFile file;
     TnFbxNull null;
     null.setName("null");

@@ -88,7 +88,7 @@ TEST(Allocation, AGapWithoutMemoryThrowsAndLeavesTheChannelAsItWas) {
     }
 }
 
-TEST(Allocation, AGapThatNobodyMeansIsRefusedBeforeMemoryIsAskedFor) {
+TEST(Allocation, AnImplausibleGapIsRefusedBeforeMemoryIsAllocated) {
     TnFbxChannel channel = channelOver(10, {1.0f, 2.0f});
     const float beyond = static_cast<float>(TnFbxChannel::kMostAddedSamples) + 100.0f;
 

@@ -370,7 +370,7 @@ class ChannelObjectOwner : public testing::Test {};
 using ObjectOwners = testing::Types<Transform, Camera, Light>;
 TYPED_TEST_SUITE(ChannelObjectOwner, ObjectOwners, OwnerNames);
 
-TYPED_TEST(ChannelObjectOwner, HandsOutTheChannelItself) {
+TYPED_TEST(ChannelObjectOwner, ReturnsTheChannelItself) {
     TypeParam owner;
 
     for (const auto channel : allChannels<TypeParam>()) {
@@ -386,7 +386,7 @@ TYPED_TEST(ChannelObjectOwner, HandsOutTheChannelItself) {
     }
 }
 
-TYPED_TEST(ChannelObjectOwner, HandsOutNoChannelForANumberThatIsNone) {
+TYPED_TEST(ChannelObjectOwner, ReturnsNoChannelForAnInvalidNumber) {
     TypeParam owner;
 
     for (const auto channel : numbersThatAreNoChannel<TypeParam>()) {

@@ -185,7 +185,7 @@ TEST(LookAtRotation, RoundsEveryStepToSinglePrecision) {
     EXPECT_FLOAT_EQ(result.angles[2], -0x1.5cf1a2p+5f);
 }
 
-TEST(LookAtRotation, ComesThroughWhatIsNoNumber) {
+TEST(LookAtRotation, SurvivesValuesThatAreNotFinite) {
     const Floats result = anglesAlong({kNaN, 0.0f, -1.0f});
     EXPECT_TRUE(std::isnan(result[1]));
 

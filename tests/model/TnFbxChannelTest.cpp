@@ -416,7 +416,7 @@ TEST(TnFbxChannel, KeepsEqualSamplesAsOneWithoutShowingIt) {
     }
 }
 
-TEST(TnFbxChannel, TellsZerosAndNaNsApartWhereItKeepsOneSample) {
+TEST(TnFbxChannel, DistinguishesZerosAndNaNsWhereItKeepsOneSample) {
     EXPECT_TRUE(channelOver(1, {2.0f, 2.0f, 2.0f}).isConstant());
     EXPECT_TRUE(channelOver(1, {kNaN, kNaN}).isConstant());
     EXPECT_FALSE(channelOver(1, {0.0f, -0.0f}).isConstant());

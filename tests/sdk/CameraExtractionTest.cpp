@@ -116,7 +116,7 @@ TEST(CameraExtraction, MapsApertureModes) {
     }
 }
 
-TEST(CameraExtraction, KeepsTheProjectionForANumberThatIsNone) {
+TEST(CameraExtraction, KeepsTheProjectionForAnInvalidNumber) {
     TestScene scene;
     fbxsdk::FbxNode* node = addCamera(scene);
     static_cast<fbxsdk::FbxProperty&>(node->GetCamera()->ProjectionType).Set(5);
@@ -208,7 +208,7 @@ TEST(CameraExtraction, NeverReadsTheSingleFieldOfView) {
     EXPECT_FALSE(camera.getAnimated(Camera::kFbxCameraFieldOfView));
 }
 
-TEST(CameraExtraction, KeepsTheLensForAnApertureModeThatIsNone) {
+TEST(CameraExtraction, KeepsTheLensForAnInvalidApertureMode) {
     TestScene scene(0, 1);
     fbxsdk::FbxNode* node = addCamera(scene);
     static_cast<fbxsdk::FbxProperty&>(node->GetCamera()->ApertureMode).Set(9);

@@ -50,7 +50,7 @@ TEST(CurveKeys, AreNoneForAChannelThatIsNotAnimated) {
     EXPECT_EQ(scene.curve->GetValue(), 2.5f);
 }
 
-TEST(CurveKeys, StandAtEveryFrameOfTheRangeAndAreLinear) {
+TEST(CurveKeys, AreAtEveryFrameOfTheRangeAndLinear) {
     CurveScene scene;
     TnFbxChannel channel;
     Samples samples;
@@ -81,7 +81,7 @@ TEST(CurveKeys, ScaleTheSamplesButNotTheDefaultValue) {
     EXPECT_EQ(scene.curve->GetValue(), 0.75f);
 }
 
-TEST(CurveKeys, StandAtFrameDividedByTheChannelsOwnRate) {
+TEST(CurveKeys, AreAtTheFrameDividedByTheRateOfTheChannel) {
     CurveScene scene;
     scene.scene->GetGlobalSettings().SetTimeMode(fbxsdk::FbxTime::eFrames24);
     TnFbxChannel channel;

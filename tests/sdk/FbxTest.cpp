@@ -211,14 +211,14 @@ TEST(FbxReading, ForgetsTheLastErrorAfterASuccess) {
 
 // ---- Readers ----
 
-TEST(FbxReading, HandsOutEveryObjectOfTheKind) {
+TEST(FbxReading, ReturnsEveryObjectOfTheKind) {
     const Read read(&Fbx::getLights, optionsFor("lights_7400_ascii.fbx"));
 
     EXPECT_TRUE(read.result) << lastError();
     EXPECT_EQ(read.names(), Names({"point", "directional", "spot", "area"}));
 }
 
-TEST(FbxReading, HandsOutANullArrayForAKindThatTheFileHasNot) {
+TEST(FbxReading, ReturnsANullArrayForAKindThatTheFileLacks) {
     const Read meshes(&Fbx::getMeshes, optionsFor("lights_7400_ascii.fbx"));
     const Read markers(&Fbx::getMarkers, optionsFor("lights_7400_ascii.fbx"));
 
@@ -230,14 +230,14 @@ TEST(FbxReading, HandsOutANullArrayForAKindThatTheFileHasNot) {
     EXPECT_EQ(lastError(), "");
 }
 
-TEST(FbxReading, HandsOutASingleObjectByName) {
+TEST(FbxReading, ReturnsASingleObjectByName) {
     const Read read(&Fbx::getLights, optionsFor("lights_7400_ascii.fbx", "area"));
 
     EXPECT_TRUE(read.result);
     EXPECT_EQ(read.names(), Names({"area"}));
 }
 
-TEST(FbxReading, HandsOutNothingForANameThatNoNodeOfTheKindBears) {
+TEST(FbxReading, ReturnsNothingForANameThatNoNodeOfTheKindHas) {
     for (const char* name : {"Area", "are", "", "camera"}) {
         const Read read(&Fbx::getLights, optionsFor("lights_7400_ascii.fbx", name));
 
@@ -270,7 +270,7 @@ TEST(FbxReading, ByNameFindsTheNodesOfTheKindAndNoOthers) {
     }
 }
 
-TEST(FbxReading, ByNameHandsOutTheValuesOfTheNode) {
+TEST(FbxReading, ByNameReturnsTheValuesOfTheNode) {
     const Read mesh(&Fbx::getMeshes, optionsFor("mesh_7400_ascii.fbx", "shape"));
     ASSERT_EQ(mesh.count, 1);
     EXPECT_EQ(mesh.objects[0].getNumberOfPolygons(), 2);
@@ -312,7 +312,7 @@ TEST(FbxReading, ByNameTellsAMeshFromANullOfItsName) {
               5.0f); // the first in the tree
 }
 
-TEST(FbxReading, ByNameHandsOutTheFirstOfSeveralThatBearIt) {
+TEST(FbxReading, ByNameReturnsTheFirstOfSeveralWithTheName) {
     const support::TemporaryFolder folder;
     TnFbxReadInfo info = optionsFor("", "parent");
     info.setFileName(
@@ -329,7 +329,7 @@ TEST(FbxReading, ByNameHandsOutTheFirstOfSeveralThatBearIt) {
     EXPECT_EQ(Read(&Fbx::getNulls, info).names(), Names({"parent", "parent"}));
 }
 
-TEST(FbxReading, HandsOutProducerCamerasAlsoOfAFileWithoutCameras) {
+TEST(FbxReading, ReturnsProducerCamerasAlsoOfAFileWithoutCameras) {
     const Read all(&Fbx::getCameras, optionsFor("nulls_7400_ascii.fbx"));
     EXPECT_TRUE(all.result);
     EXPECT_EQ(all.names(), Names({"Producer Perspective", "Producer Top", "Producer Bottom", "Producer Front",
@@ -484,7 +484,7 @@ TEST(FbxLoadScene, LeavesTheContextWithoutASceneAfterAFailure) {
     EXPECT_EQ(sdk.getScene(), nullptr);
 }
 
-TEST(FbxObjectCount, IsTheNumberOfCandidatesWhenAllAreAskedFor) {
+TEST(FbxObjectCount, IsTheNumberOfCandidatesWhenAllAreRequested) {
     FbxSdk sdk; // names are not compared
     EXPECT_EQ(Fbx().getNumberOfObjects(5, true, 4, "", sdk), 5);
     EXPECT_EQ(Fbx().getNumberOfObjects(0, true, 4, "", sdk), 0);

@@ -75,7 +75,7 @@ TEST(FbxWriting, NeedsAnAnimationStackName) {
     EXPECT_FALSE(fs::exists(folder.file("out"))) << "nothing is made before the options are complete";
 }
 
-TEST(FbxWriting, IsTextUnlessAskedOtherwise) {
+TEST(FbxWriting, IsTextByDefault) {
     TemporaryFolder folder;
     TnFbxWriteInfo info = optionsFor(folder.file("shot.fbx"));
     EXPECT_TRUE(write(info)) << lastError();

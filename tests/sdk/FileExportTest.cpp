@@ -80,7 +80,7 @@ TEST(FileExport, TakesTheNativeWriterForEmbeddedMediaWhateverTheFlag) {
     EXPECT_TRUE(isBinary(scene.saved()));
 }
 
-TEST(FileExport, WritesTheVersionAskedForAndTheNewestForWhatIsNone) {
+TEST(FileExport, WritesTheRequestedVersionAndTheNewestForAnInvalidOne) {
     const std::pair<int, int> versions[] = {{0, 6100}, {1, 7100}, {2, 7200},  {3, 7300},  {4, 7400},
                                             {5, 7500}, {6, 7500}, {17, 7500}, {-1, 7500}, {-2147483647, 7500}};
     for (const auto& [version, number] : versions) {

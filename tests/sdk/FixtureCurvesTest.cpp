@@ -263,7 +263,7 @@ TEST(TwoStacksFixture, GiveTheFirstOneFromItsFrameOn) {
     }
 }
 
-TEST(TwoStacksFixture, GiveTheFirstOneAlsoWhenTheSecondIsAskedFor) {
+TEST(TwoStacksFixture, GiveTheFirstOneAlsoWhenTheSecondIsRequested) {
     for (TnFbxReadInfo info :
          {test::localRead(fixture("two_stacks_7400_ascii.fbx")), worldRead("two_stacks_7400_ascii.fbx")}) {
         info.setAnimationStackName("run");

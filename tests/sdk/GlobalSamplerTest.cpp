@@ -174,7 +174,7 @@ TEST(ListsInTheWorld, EvaluateNoMoreThanTheLimitWhereNothingShows) {
     EXPECT_FALSE(scene.sdk.getNulls(info, nulls.data(), 1));
 }
 
-TEST(CameraTargets, ThatStandStillTurnACameraOnceHoweverLongTheClip) {
+TEST(CameraTargets, ThatAreStaticRotateACameraOnceHoweverLongTheClip) {
     const support::MemoryLimitScope limit(1 << 16);
     TestScene scene(0, 1'000'000'000);
     fbxsdk::FbxNode* node = scene.add<fbxsdk::FbxCamera>("camera");

@@ -153,7 +153,7 @@ TEST(MeshConstruction, WritesColoursByPolygonVertexWithIndicesThatCount) {
     EXPECT_EQ(colours->GetIndexArray().GetAt(2), 2);
 }
 
-TEST(MeshConstruction, SkipsPolygonsWithoutCornersAndGoesOnWhereTheyStand) {
+TEST(MeshConstruction, SkipsPolygonsWithoutVerticesAndContinuesWithTheNextVertex) {
     const Constructed made(*meshOf({3, 0, 4, -2, 1}, 8));
 
     EXPECT_THAT(cornersOf(made.mesh()), ElementsAre(ElementsAre(0, 1, 2), ElementsAre(3, 4, 5, 6), ElementsAre(7)));

@@ -47,7 +47,7 @@ TEST(MeshMemory, BeyondTheLimitFailsAndSaysWhatWouldBeNeeded) {
     EXPECT_THAT(lastError(), testing::HasSubstr("would be needed; the limit is 100 bytes"));
 }
 
-TEST(MeshMemory, WithinTheLimitIsHandedOut) {
+TEST(MeshMemory, WithinTheLimitIsReturned) {
     const Limited limit(100000);
 
     const Meshes meshes = readMeshes();

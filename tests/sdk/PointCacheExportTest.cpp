@@ -367,7 +367,7 @@ TEST(MayaPointCache, HasOneChannelOfPointsNamedAfterTheNode) {
     EXPECT_THAT(scene.folder.read("out/shot_fpc/ball.xml"), HasSubstr("\"Points\""));
 }
 
-TEST(MayaPointCache, CannotBeOpenedForARateThatIsNone) {
+TEST(MayaPointCache, CannotBeOpenedForAnInvalidRate) {
     for (const float rate : {0.0f, -24.0f, std::numeric_limits<float>::quiet_NaN()}) {
         CacheScene scene;
         ASSERT_TRUE(scene.map());
@@ -450,7 +450,7 @@ TEST(PointCachesOfAScene, AreWideOnlyForExactlyTheNewestVersion) {
     }
 }
 
-TEST(PointCachesOfAScene, AreOfTheFormatAskedFor) {
+TEST(PointCachesOfAScene, AreOfTheRequestedFormat) {
     TemporaryFolder folder;
     WrittenScene scene;
     const auto mesh = movingMesh("mesh", 3);
@@ -464,7 +464,7 @@ TEST(PointCachesOfAScene, AreOfTheFormatAskedFor) {
     EXPECT_THAT(filesIn(folder.file("out/shot_fpc")), ElementsAre("mesh.pc2"));
 }
 
-TEST(PointCachesOfAScene, AreNotMadeWhenNotAskedFor) {
+TEST(PointCachesOfAScene, AreNotCreatedWhenNotRequested) {
     TemporaryFolder folder;
     WrittenScene scene;
     const auto mesh = movingMesh("mesh", 3);
@@ -535,7 +535,7 @@ TEST(PointCachesOfAScene, StayWhenTheSceneCannotBeSaved) {
     EXPECT_THAT(filesIn(folder.file("out/shot_fpc")), ElementsAre("mesh.mcx", "mesh.xml"));
 }
 
-TEST(PointCachesOfAScene, WaitForTheSceneWhenTheyAreToAppearWithIt) {
+TEST(PointCachesOfAScene, AreWrittenWithTheSceneWhenTheyAreToAppearWithIt) {
     TemporaryFolder folder;
     WrittenScene scene;
     scene.sdk.letPointCachesAppearWithScene();
@@ -551,7 +551,7 @@ TEST(PointCachesOfAScene, WaitForTheSceneWhenTheyAreToAppearWithIt) {
     EXPECT_THAT(filesIn(folder.file("out/shot_fpc")), ElementsAre("mesh.mcx", "mesh.xml"));
 }
 
-TEST(PointCachesOfAScene, SurviveARangeThatIsNone) {
+TEST(PointCachesOfAScene, SurviveAnInvalidRange) {
     const float kNaN = std::numeric_limits<float>::quiet_NaN();
     const std::pair<float, float> ranges[] = {{kNaN, kNaN}, {-1e30f, 1e30f}, {1e30f, -1e30f}, {1e30f, 1e30f}};
     for (const auto& [start, end] : ranges) {

@@ -29,7 +29,7 @@ TEST(PointCacheName, IsThatOfTheNodeWhereItIsPlain) {
     }
 }
 
-TEST(PointCacheName, EscapesWhatCannotStandInTheNameOfAFile) {
+TEST(PointCacheName, EscapesCharactersThatFileNamesCannotContain) {
     const std::pair<const char*, const char*> rows[] = {
         {"a/b", "a%2Fb"},
         {"a\\b", "a%5Cb"},

@@ -73,7 +73,7 @@ TEST(ReadWarnings, NameMeshesWhoseCacheIsDamaged) {
     }
 }
 
-TEST(ReadWarnings, NameMeshesThatAreDroppedBecauseTheirNameStandsTwice) {
+TEST(ReadWarnings, NameMeshesThatAreDroppedBecauseTheirNameOccursTwice) {
     const support::TemporaryFolder folder;
     const std::string mesh = "Model: \"Model::ball\", \"Mesh\" { Vertices: 0,0,0,1,0,0,0,1,0\n"
                              "PolygonVertexIndex: 0,1,-3\n }\n";
@@ -147,7 +147,7 @@ TEST_P(CornersBeyondThePoints, AreReadAsTheFirstPointWithAWarning) {
                                             "control point 0 is read instead"));
 }
 
-TEST_P(CornersBeyondThePoints, AreSaidToBeLeftOutWhereThereIsNoPoint) {
+TEST_P(CornersBeyondThePoints, AreReportedAsLeftOutWhereThereIsNoPoint) {
     const std::string file = write(/*hasPoints*/ false);
     TnFbxReadInfo options = info(file);
     TnFbxMesh* meshes = nullptr;

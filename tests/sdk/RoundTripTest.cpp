@@ -467,7 +467,7 @@ TEST_P(RoundTrip, OfObjectsOfOneName) {
     }
 }
 
-TEST_P(RoundTrip, OfSamplesThatAreNoNumbersReadsSoundly) {
+TEST_P(RoundTrip, OfSamplesThatAreNotFiniteIsReadable) {
     const float kNaN = std::numeric_limits<float>::quiet_NaN();
     const float kInfinity = std::numeric_limits<float>::infinity();
     TnFbxNull null;
@@ -486,7 +486,7 @@ TEST_P(RoundTrip, OfSamplesThatAreNoNumbersReadsSoundly) {
     EXPECT_EQ(FacadeRead<TnFbxMesh>(file())["mesh"].getNumberOfControlPoints(), 3);
 }
 
-TEST_P(RoundTrip, OfPointIndicesThatNameNoPointReadsSoundly) {
+TEST_P(RoundTrip, OfPointIndicesOutOfRangeIsReadable) {
     const auto mesh = test::polygonMesh("mesh", 4);
     mesh->setPointIndex(0, -1);
     mesh->setPointIndex(1, std::numeric_limits<int>::min());

@@ -93,7 +93,7 @@ TEST(SceneConstruction, KeepsTheOrderOfTheListsAndSkipsNullPointers) {
     EXPECT_THAT(scene.childNames(), ElementsAre("b", "a", "b"));
 }
 
-TEST(SceneConstruction, WritesOnlyTheKindsAskedFor) {
+TEST(SceneConstruction, WritesOnlyTheRequestedKinds) {
     using Setter = bool (TnFbxWriteInfo::*)(bool);
     const std::pair<Setter, const char*> flags[] = {{&TnFbxWriteInfo::setWriteCameras, "camera"},
                                                     {&TnFbxWriteInfo::setWriteLights, "light"},

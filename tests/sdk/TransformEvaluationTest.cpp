@@ -401,7 +401,7 @@ TEST(GlobalTransform, DecomposesDifferentlyAtTheOriginAndBesideIt) {
     }
 }
 
-TEST(GlobalTransform, IsBesideTheOriginHoweverNearItStands) {
+TEST(GlobalTransform, IsNotAtTheOriginHoweverCloseItIs) {
     TestScene scene(0, 0);
     fbxsdk::FbxNode* node = scene.addNode("node");
     node->LclRotation.Set({90.0, 40.0, 0.0});

@@ -191,7 +191,7 @@ TEST_P(VertexCache, ThatIsSwitchedOffIsAWarning) {
               std::vector<std::string>{"\"mesh\" is read without its point cache: it is switched off"});
 }
 
-TEST_P(VertexCache, ThatNobodyNamesIsAWarning) {
+TEST_P(VertexCache, ThatTheDeformerLacksIsAWarning) {
     CacheScene scene(GetParam());
     scene.deformer->SetCache(nullptr);
     EXPECT_EQ(warningsOf(scene),
@@ -240,7 +240,7 @@ TEST_P(VertexCache, ThatDoesNotOpenLeavesShapesAndSkin) {
     expectPoint(points[1], 1.0, 100.0, 0.0);
 }
 
-TEST_P(VertexCache, ThatIsCutOffLeavesThePointsAlone) {
+TEST_P(VertexCache, ThatIsTruncatedLeavesThePointsUnchanged) {
     CacheScene scene(GetParam());
     const char* data = GetParam() == FbxCache::eMayaCache ? "points.mc" : "points.pc2";
     const std::string whole = scene.folder.read(data);

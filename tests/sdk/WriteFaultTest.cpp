@@ -441,7 +441,7 @@ TEST_P(WriteFault, OfTheCacheOnAMediumThatIsFullWritesTheMeshWithoutItAndSaysSo)
     }
 }
 
-TEST_P(WriteFault, OfADeviceThatIsFullIsSaid) {
+TEST_P(WriteFault, OfADeviceThatIsFullIsReported) {
     fs::create_symlink("/dev/full", file);
 
     EXPECT_FALSE(write());
@@ -452,7 +452,7 @@ TEST_P(WriteFault, OfADeviceThatIsFullIsSaid) {
     EXPECT_EQ(folder.files(), Names{"shot.fbx"}) << "nor is there a cache that nothing refers to";
 }
 
-TEST_P(WriteFault, OfAPipeThatBreaksIsSaid) {
+TEST_P(WriteFault, OfAPipeThatBreaksIsReported) {
     ASSERT_EQ(::mkfifo(file.c_str(), 0600), 0);
     test::WrittenObjects many = objects; // more than a pipe holds without a reader
     many.meshes.insert(many.meshes.end(), 100, objects.meshes[0]);
@@ -511,7 +511,7 @@ TEST_P(WriteFault, OfAFileInThePlaceOfTheFolderLeavesIt) {
     EXPECT_EQ(folder.files(), Names{"out"});
 }
 
-TEST_P(WriteFault, OfAFolderThatVanishedIsSaid) {
+TEST_P(WriteFault, OfAFolderThatWasRemovedIsReported) {
     fs::create_directory(folder.file("out"));
     setFileName(folder.file("out/shot.fbx"));
     test::WrittenScene scene;

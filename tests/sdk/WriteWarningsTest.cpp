@@ -58,7 +58,7 @@ TEST_F(WriteWarnings, AreNoneForWhatIsSound) {
     EXPECT_THAT(warnings(), IsEmpty());
 }
 
-TEST_F(WriteWarnings, NameARateThatIsNone) {
+TEST_F(WriteWarnings, NameAnInvalidRate) {
     const std::pair<float, const char*> rates[] = {{0.0f, "0 "}, {-24.0f, "-24 "}, {kNaN, "nan "}, {kInfinity, "inf "}};
     for (const auto& [rate, text] : rates) {
         info.setFPS(rate);
@@ -106,7 +106,7 @@ TEST_F(WriteWarnings, LookAtWhatIsWrittenOfCamerasAndLights) {
     EXPECT_THAT(warnings(), ElementsAre(StartsWith("camera and 1 more: ")));
 }
 
-TEST_F(WriteWarnings, NameSamplesAtARateThatIsNone) {
+TEST_F(WriteWarnings, NameSamplesAtAnInvalidRate) {
     TnFbxNull null;
     null.setName("null");
     null.setTransformValueAt(TnFbxTransform::kFbxTransformPositionX, test::timeOf(1, 2, kNaN), {1.0f, 2.0f});

@@ -91,7 +91,7 @@ struct ThreadsScope {
     ~ThreadsScope() { setMaximumThreads(1); }
 };
 
-TEST(FacadeThreads, WorkOnTheCallersThreadUnlessToldOtherwise) {
+TEST(FacadeThreads, WorkOnTheCallersThreadByDefault) {
     EXPECT_EQ(maximumThreads(), 1);
     const ThreadsScope threads(3);
     EXPECT_EQ(maximumThreads(), 3);

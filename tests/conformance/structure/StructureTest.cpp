@@ -47,7 +47,7 @@ TEST(Structure, FindsNothingBetweenEqualFiles) {
     EXPECT_THAT(between(kFile, kFile), IsEmpty());
 }
 
-TEST(Structure, SeesARecordThatNobodyElseWrites) {
+TEST(Structure, ReportsARecordThatTheOthersDoNotWrite) {
     EXPECT_THAT(between("A: { B: 1\n C: 2 }", "A: { B: 1 }"), ElementsAre("nowhere else: A/C"));
 }
 

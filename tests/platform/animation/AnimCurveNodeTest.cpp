@@ -120,7 +120,7 @@ TEST_F(FbxAnimCurveNodeTest, LetsGoOfACurveChannelByChannel) {
     EXPECT_FALSE(made->IsConnectedSrcObject(curve));
 }
 
-TEST_F(FbxAnimCurveNodeTest, ForgetsACurveThatDies) {
+TEST_F(FbxAnimCurveNodeTest, ForgetsADestroyedCurve) {
     FbxAnimCurveNode* made = typed(node->LclTranslation);
     FbxAnimCurve* curve = made->CreateCurve("", "X");
     made->ConnectToChannel(curve, "Y");

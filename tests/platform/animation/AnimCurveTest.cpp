@@ -155,7 +155,7 @@ TEST_F(FbxAnimCurveTest, MovesAKeyWhoseTimeIsSet) {
     EXPECT_EQ(values(), (Values{3, 2, 9}));
 }
 
-TEST_F(FbxAnimCurveTest, ReplacesTheKeyThatStandsWhereAnotherIsMoved) {
+TEST_F(FbxAnimCurveTest, ReplacesTheKeyAtTheTimeToWhichAnotherIsMoved) {
     key(10, 1);
     key(20, 2);
 
@@ -275,7 +275,7 @@ TEST_F(FbxAnimCurveTest, SpansFromTheFirstKeyToTheLast) {
     EXPECT_EQ(span.GetStop(), FbxTime(30));
 }
 
-TEST_F(FbxAnimCurveTest, EvaluatesAnewAfterEveryChange) {
+TEST_F(FbxAnimCurveTest, EvaluatesAgainAfterEveryChange) {
     key(0, 0);
     key(10, 10);
     for (int i = 0; i < 2; ++i)
@@ -326,7 +326,7 @@ TEST_F(FbxAnimCurveTest, EvaluatesByIndexOverTheWholeRangeOfTime) {
 
 // Extrapolation as a setting.
 
-TEST_F(FbxAnimCurveTest, IsHeldConstantOutsideUnlessToldOtherwise) {
+TEST_F(FbxAnimCurveTest, IsHeldConstantOutsideByDefault) {
     EXPECT_EQ(curve->GetPreExtrapolation(), FbxAnimCurveBase::eConstant);
     EXPECT_EQ(curve->GetPostExtrapolation(), FbxAnimCurveBase::eConstant);
     key(0, 1);

@@ -40,7 +40,7 @@ TEST_F(FbxAnimStackTest, HasSpansThatAreUnrelatedToKeys) {
     EXPECT_EQ(stack->GetLocalTimeSpan().GetStop(), FbxTime(0));
 }
 
-TEST_F(FbxAnimStackTest, StartsAnewWhenReset) {
+TEST_F(FbxAnimStackTest, HasItsDefaultsAfterAReset) {
     stack->Description.Set(FbxString("words"));
     stack->SetLocalTimeSpan(FbxTimeSpan(FbxTime(10), FbxTime(20)));
     stack->SetReferenceTimeSpan(FbxTimeSpan(FbxTime(10), FbxTime(20)));
@@ -63,7 +63,7 @@ TEST_F(FbxAnimStackTest, HoldsLayersAsSourcesInOrder) {
     EXPECT_EQ(stack->GetMemberCount<FbxAnimLayer>(), 2);
 }
 
-TEST_F(FbxAnimLayerTest, AddsAtFullWeightUnlessToldOtherwise) {
+TEST_F(FbxAnimLayerTest, AddsAtFullWeightByDefault) {
     EXPECT_EQ(layer->Weight.Get(), 100.0);
     EXPECT_TRUE(layer->Weight.GetFlag(FbxPropertyFlags::eAnimatable));
     EXPECT_FALSE(layer->Mute.Get());
@@ -85,7 +85,7 @@ TEST_F(FbxAnimLayerTest, KnowsTheNumbersOfFiles) {
     EXPECT_EQ(FbxAnimLayer::eScaleAdditive, 1);
 }
 
-TEST_F(FbxAnimLayerTest, StartsAnewWhenReset) {
+TEST_F(FbxAnimLayerTest, HasItsDefaultsAfterAReset) {
     layer->Weight.Set(3.0);
     layer->Mute.Set(true);
     layer->BlendMode.Set(FbxAnimLayer::eBlendOverride);

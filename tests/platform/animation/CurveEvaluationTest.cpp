@@ -279,7 +279,7 @@ TEST(CurveEvaluation, StopsRelativeRepetitionsWhereTheyHaveCome) {
     EXPECT_EQ(at(curve, -100.0), -4.0F);
 }
 
-TEST(CurveEvaluation, GoesOnInALineWhenTheSlopeIsKept) {
+TEST(CurveEvaluation, ContinuesAsALineWhenTheSlopeIsKept) {
     const Extrapolation slope = {ExtrapolationType::keepSlope, -1};
     const CurveKeys cubic = curveOf({{0.0, 1.0F, kUser, 2.0F, -3.0F}, {1.0, 5.0F, kUser}}, slope, slope);
     EXPECT_EQ(at(cubic, -2.0), -3.0F);
@@ -404,7 +404,7 @@ TEST(CurveEvaluation, LetsTheLastOfSeveralKeysAtOneTimeCount) {
     EXPECT_EQ(at(curve, 1.5), 35.0F);
 }
 
-TEST(CurveEvaluation, SurvivesKeysThatAllStandAtOneTime) {
+TEST(CurveEvaluation, SurvivesKeysThatAreAllAtOneTime) {
     for (const int type : {1, 2, 3, 4, 5}) {
         const Extrapolation extrapolation = {static_cast<ExtrapolationType>(type), -1};
         const CurveKeys curve = curveOf({{1.0, 10.0F, kAuto}, {1.0, 20.0F, kAuto}}, extrapolation, extrapolation);

@@ -44,7 +44,7 @@ TEST(FrameRateOfTimes, IsThatOfAKeyPerFrame) {
     }
 }
 
-TEST(FrameRateOfTimes, TellsNeighbouringRatesApart) {
+TEST(FrameRateOfTimes, DistinguishesNeighbouringRates) {
     for (const double rate : {29.97, 30000.0 / 1001.0, 23.976, 24000.0 / 1001.0}) {
         const double found = frameRateOfTimes(timesAt(rate, 0, 1000));
         EXPECT_NEAR(found, rate, 1e-7 * rate);
@@ -52,7 +52,7 @@ TEST(FrameRateOfTimes, TellsNeighbouringRatesApart) {
 }
 
 // Hosts keep their rate in single precision, and their times are those of that number.
-TEST(FrameRateOfTimes, IsTheDecimalFractionThatAFloatStandsFor) {
+TEST(FrameRateOfTimes, IsTheDecimalFractionThatAFloatApproximates) {
     for (const float rate : {29.97F, 23.976F, 59.94F})
         EXPECT_EQ(static_cast<float>(frameRateOfTimes(timesAt(static_cast<double>(rate), 1, 100))), rate);
     EXPECT_EQ(frameRateOfTimes(timesAt(static_cast<double>(29.97F), 1, 100)), 29.97);
@@ -80,9 +80,7 @@ TEST(FrameRateOfTimes, DoesNotFollowAFewKeysBetweenFrames) {
     EXPECT_EQ(frameRateOfTimes(times), 24.0);
 }
 
-TEST(FrameRateOfTimes, FollowsKeysThatAllStandOnHalfFrames) {
-    EXPECT_EQ(frameRateOfTimes(timesAt(48.0, 0, 100)), 48.0);
-}
+TEST(FrameRateOfTimes, FollowsKeysThatAreAllOnHalfFrames) { EXPECT_EQ(frameRateOfTimes(timesAt(48.0, 0, 100)), 48.0); }
 
 TEST(FrameRateOfTimes, EndsForTimesAtBothEndsOfTheirRange) {
     using Limits = std::numeric_limits<std::int64_t>;

@@ -113,7 +113,7 @@ TEST_F(PropertyEvaluationTest, AddsAFurtherLayerByItsWeight) {
     EXPECT_EQ(translation(), FbxDouble3(10, 20, 30));
 }
 
-TEST_F(PropertyEvaluationTest, AddsToTheStaticValueWhereTheBaseLayerHasNoSay) {
+TEST_F(PropertyEvaluationTest, AddsToTheStaticValueWhereTheBaseLayerHasNoCurve) {
     node->LclTranslation.Set(FbxDouble3(1, 2, 3));
     set(node->LclTranslation, second, 10, 20, 30);
 

@@ -34,7 +34,7 @@ extensions::CacheFacts factsOf(const std::string& file) {
     return facts;
 }
 
-TEST(CacheFacts, TellsAHundredThousandChannelsApart) {
+TEST(CacheFacts, DistinguishesAHundredThousandChannels) {
     constexpr std::size_t kChannels = 100'000; // a separate search for each would take a minute
     const std::vector<double> point = {1, 2, 3};
     std::vector<std::string> names;

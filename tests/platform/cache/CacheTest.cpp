@@ -101,7 +101,7 @@ TEST_F(FbxCacheTest, KeepsNameAndFormatAsFilesHaveThem) {
     EXPECT_STREQ(absolute.Buffer(), "");
 }
 
-TEST_F(FbxCacheTest, TakesAFormatThatIsNoneForUnknown) {
+TEST_F(FbxCacheTest, TakesAnInvalidFormatForUnknown) {
     FbxCache* made = FbxCache::Create(manager, "cache");
     for (const FbxEnum wrong : {-1, 4, std::numeric_limits<int>::max()}) {
         made->FindProperty("CacheFileType").Set(wrong);
@@ -296,7 +296,7 @@ TEST_F(FbxCacheTest, KeepsNameAndFormatWhileItIsOpen) {
     EXPECT_TRUE(made->IsOpen());
 }
 
-TEST_F(FbxCacheTest, AnswersNothingWhileItIsClosed) {
+TEST_F(FbxCacheTest, ReturnsNothingWhileItIsClosed) {
     FbxCache* made = writtenMaya();
     Points points{};
     FbxTime time, end;
@@ -324,7 +324,7 @@ TEST_F(FbxCacheTest, AnswersNothingWhileItIsClosed) {
     EXPECT_EQ(made->GetFrameStartOffset(), 0.0);
 }
 
-TEST_F(FbxCacheTest, AnswersNothingOfTheOtherFormat) {
+TEST_F(FbxCacheTest, ReturnsNothingOfTheOtherFormat) {
     FbxCache* maya = writtenMaya();
     FbxCache* max = writtenMax();
     ASSERT_TRUE(maya->OpenFileForRead());
@@ -409,7 +409,7 @@ TEST_F(FbxCacheTest, SaysThatAFileCannotBeMade) {
     EXPECT_TRUE(status.Error());
 }
 
-TEST_F(FbxCacheTest, MayDieWhileItIsOpen) {
+TEST_F(FbxCacheTest, MayBeDestroyedWhileItIsOpen) {
     FbxCache* reading = writtenMaya();
     ASSERT_TRUE(reading->OpenFileForRead());
     FbxCache* writing = cacheAt(folder.file("half.pc2"), FbxCache::eMaxPointCacheV2);

@@ -218,7 +218,7 @@ TEST(MayaCache, SaysWhereItsDataIsDamaged) {
                  (folder.file("ball.mcx") + ": offset " + std::to_string(second) + ": truncated or damaged").c_str());
 }
 
-TEST(MayaCache, TakesZerosBehindItsSamples) {
+TEST(MayaCache, AcceptsZerosAfterItsSamples) {
     const support::TemporaryFolder folder;
     const std::string file = writeBall(folder, true);
     folder.write("ball.mcx", folder.read("ball.mcx") + std::string(100, '\0'));

@@ -74,7 +74,7 @@ TEST(AsciiReader, LeavesTheVersionOpenWhenNoCommentStatesIt) {
     EXPECT_EQ(recordsText(file.tree->root), "FBXHeaderExtension: { FBXVersion: 6100 }");
 }
 
-TEST(AsciiReader, RefusesVersionsThatNobodyKnows) {
+TEST(AsciiReader, RefusesUnknownVersions) {
     for (const char* const version : {"8.0.0", "9.9.9", "2.0.0", "0.1.0"}) {
         const ReadFile file("\n; FBX " + std::string(version) + " project file\nObjects: {}\n");
 
@@ -183,7 +183,7 @@ TEST(AsciiReader, ReadsArraysAndCountsThemItself) {
 }
 
 // "35,5" where 35.5 is meant.
-TEST(AsciiReader, RefusesArraysThatHoldMoreThanTheySay) {
+TEST(AsciiReader, RefusesArraysThatHaveMoreThanTheirCount) {
     EXPECT_EQ(asciiText("A: 1\nB: *2 {\n a: 35,5,1,25\n}"),
               "test.fbx: line 4: the list of 'B' holds 4 numbers, but its count is 2");
     EXPECT_EQ(asciiText("C: *0 { a: 1 }"), "test.fbx: line 2: the list of 'C' holds 1 numbers, but its count is 0");
@@ -200,7 +200,7 @@ TEST(AsciiReader, CountsLinesWithBothLineEndsOnce) {
     EXPECT_EQ(asciiText("A: 1\r\nB: 1x\r\n"), "test.fbx: line 3: expected a number instead of '1x'");
 }
 
-TEST(AsciiReader, AcceptsZerosBehindTheLastRecord) {
+TEST(AsciiReader, AcceptsZerosAfterTheLastRecord) {
     EXPECT_EQ(asciiText("A: 1\nB: { C: 2 }\n" + std::string(5000, '\0')), "A: 1 B: { C: 2 }");
     EXPECT_EQ(asciiText("A: 1\nB: { C: 2 \n" + std::string(3, '\0')),
               "test.fbx: line 4: the file ends within the block of 'B' that starts in line 3");
@@ -298,7 +298,7 @@ TEST(AsciiReader, ReadsBitPatternsOfFloatsFrom7200On) {
     EXPECT_TRUE(std::isnan(numbers[3]));
 }
 
-TEST(AsciiReader, ReadsFloatsAsTheyStandBefore7200) {
+TEST(AsciiReader, ReadsFloatsAsWrittenBefore7200) {
     const ReadFile file("; FBX 7.1.0\nKeyAttrDataFloat: *3 { a: 4.099946e-31,1,-0.1 }\n");
 
     ASSERT_TRUE(file.tree);

@@ -196,14 +196,14 @@ TEST_P(BinaryLayout, PlacesRecordsByTheirOffset) {
     EXPECT_EQ(tree->placeOf(*tree->root.child("Second")), "offset " + std::to_string(offset));
 }
 
-TEST_P(BinaryLayout, IgnoresWhatStandsBehindTheEndOfTheList) {
+TEST_P(BinaryLayout, IgnoresBytesAfterTheEndOfTheList) {
     file.begin("First").end().nullRecord().bytes("any footer, or a second section");
     file.begin("FileId").end();
 
     EXPECT_EQ(readText(file.finish()), "First:");
 }
 
-TEST(BinaryReader, SkipsBytesBehindTheLastValueOfARecord) {
+TEST(BinaryReader, SkipsBytesAfterTheLastValueOfARecord) {
     BinaryRecordBuilder file(7400);
     file.begin("Padded").int32(1).bytes("padding").end();
     file.begin("Next").int32(2).end();
@@ -211,7 +211,7 @@ TEST(BinaryReader, SkipsBytesBehindTheLastValueOfARecord) {
     EXPECT_EQ(readText(file.finish()), "Padded: 1 Next: 2");
 }
 
-TEST(BinaryReader, SkipsBytesBehindTheNullRecordOfABlock) {
+TEST(BinaryReader, SkipsBytesAfterTheNullRecordOfABlock) {
     BinaryRecordBuilder file(7400);
     file.begin("Outer").block().nullRecord().bytes("rest").end();
     file.begin("Next").int32(2).end();
@@ -235,7 +235,7 @@ TEST(BinaryReader, AcceptsABlockThatEndsWithoutANullRecord) {
     EXPECT_EQ(readText(bytes), "Outer: { Inner: 1 } Next: 2");
 }
 
-TEST(BinaryReader, ToleratesAStrangeByteBehindTheMagic) {
+TEST(BinaryReader, ToleratesAnUnusualByteAfterTheMagic) {
     std::string bytes = BinaryRecordBuilder(7400).begin("Objects").end().finish();
     bytes[20] = '\x80';
 
@@ -270,7 +270,7 @@ TEST(BinaryReader, ReadsALongNameAndManyRecords) {
     EXPECT_EQ(count, 1000);
 }
 
-TEST(BinaryReader, RefusesVersionsThatNobodyKnows) {
+TEST(BinaryReader, RefusesUnknownVersions) {
     for (const std::uint32_t version : {0U, 2000U, 2999U, 8000U, std::numeric_limits<std::uint32_t>::max()}) {
         const ExactBytes bytes(BinaryRecordBuilder(version).begin("Objects").end().finish());
         FbxStatus status;

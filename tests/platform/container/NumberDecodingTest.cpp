@@ -187,7 +187,7 @@ TEST_P(StoredNumbers, ReadsTheFirstOfManyNumbers) {
     EXPECT_EQ(one, std::vector<std::int32_t>{5});
 }
 
-TEST_P(StoredNumbers, FillsWithZerosWhenAskedForMoreThanThereAre) {
+TEST_P(StoredNumbers, FillsWithZerosWhenMoreAreRequestedThanThereAre) {
     const Record& record = store('i', padded<std::int32_t>({5}));
 
     std::vector<double> numbers(record.numberCount() + 1, 77.0);

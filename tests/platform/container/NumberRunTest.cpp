@@ -109,7 +109,7 @@ TEST_F(LongRun, IsRefusedForTheSameReasonByAnyNumberOfThreads) {
     }
 }
 
-TEST_F(LongRun, IsRefusedWithMoreNumbersThanItSays) {
+TEST_F(LongRun, IsRefusedWithMoreNumbersThanItsCount) {
     const std::string list = listOf([](int i) { return i == kNumbers / 2 ? ",1," : ","; });
     const std::string reason = read<double>(list, 1);
     EXPECT_NE(reason.find("holds 200001 numbers, but its count is 200000"), std::string::npos) << reason;

@@ -321,7 +321,7 @@ TEST(OutputFile, FailsWithoutASignalWhenAPipeBreaks) {
     EXPECT_NE(std::string(status.GetErrorString()).find("Broken pipe"), std::string::npos) << status.GetErrorString();
 }
 
-TEST(OutputFile, GivesUpAPipeThatNobodyReads) {
+TEST(OutputFile, GivesUpAPipeWithoutAReader) {
     const TemporaryFolder folder;
     const std::string pipe = folder.file("pipe");
     ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
@@ -581,7 +581,7 @@ TEST(OutputFilesTogether, AppearWhereThereAreNoLinks) {
     EXPECT_EQ(folder.files(), (std::vector<std::string>{"first", "second"}));
 }
 
-TEST(OutputFile, TakesAnotherNameWhenSomebodyElseWritesInTheFolder) {
+TEST(OutputFile, TakesAnotherNameWhenAnotherProcessWritesInTheFolder) {
     const TemporaryFolder folder;
     FbxStatus status;
     OutputFile first(folder.file("a.fbx")), second(folder.file("a.fbx"));

@@ -87,7 +87,7 @@ TEST_F(UnitConversionTest, IsDoneOnceOnly) {
     EXPECT_EQ(top->LclScaling.Get(), FbxDouble3(100, 100, 100));
 }
 
-TEST_F(UnitConversionTest, TakesAUnitThatIsNoneForCentimetres) {
+TEST_F(UnitConversionTest, TakesAnInvalidUnitForCentimetres) {
     FbxNode* top = addNode("top");
     for (const double wrong : {0.0, -1.0, static_cast<double>(NAN), static_cast<double>(INFINITY)}) {
         scene->GetGlobalSettings().FindProperty("UnitScaleFactor").Set(wrong);
@@ -295,7 +295,7 @@ TEST_F(UnitConversionTest, LeavesWhatIsNoLengthAlone) {
     EXPECT_EQ(light->Intensity.Get(), 100.0);
 }
 
-TEST_F(UnitConversionTest, MovesTheClippingPlanesUnlessToldOtherwise) {
+TEST_F(UnitConversionTest, MovesTheClippingPlanesByDefault) {
     FbxCamera* camera = make<FbxCamera>();
     camera->NearPlane.Set(1.0);
     camera->FarPlane.Set(20.0);

@@ -39,7 +39,7 @@ TEST(FbxArray, InsertsAndRemoves) {
     EXPECT_EQ(array.Size(), 0);
 }
 
-TEST(FbxArray, HandsOutItsElements) {
+TEST(FbxArray, ReturnsItsElements) {
     FbxArray<int> array;
     array.Resize(3);
     array.SetAt(1, 5);

@@ -46,7 +46,7 @@ TEST(FbxMatrix, DividesPointsByTheirW) {
     EXPECT_EQ(matrix.MultNormalize(FbxVector4(2.0, 4.0, 6.0)), FbxVector4(2.0, 4.0, 6.0));
 }
 
-TEST(FbxMatrix, HandsOutRowsAndColumns) {
+TEST(FbxMatrix, ReturnsRowsAndColumns) {
     FbxMatrix matrix;
     matrix.SetColumn(1, FbxVector4(1.0, 2.0, 3.0, 4.0));
     EXPECT_EQ(matrix.GetColumn(1), FbxVector4(1.0, 2.0, 3.0, 4.0));

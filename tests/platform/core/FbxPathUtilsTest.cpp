@@ -173,7 +173,7 @@ TEST(FbxPathUtils, CreatesFoldersWithTheirParents) {
     EXPECT_TRUE(fs::is_directory(folder / "one/zw\xC3\xB6lf/four"));
 }
 
-TEST(FbxPathUtils, CreatesNoFolderWhereAFileStands) {
+TEST(FbxPathUtils, CreatesNoFolderWhereAFileExists) {
     const TemporaryFolder folder;
     const std::string file = folder / "file";
     std::ofstream(file) << "x";

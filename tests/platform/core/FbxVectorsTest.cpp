@@ -99,7 +99,7 @@ TEST(FbxVector4, NormalizesXYZOnly) {
     EXPECT_EQ(zero, FbxVector4(0.0, 0.0, 0.0, 2.0));
 }
 
-TEST(FbxVector4, IsFourDoublesToWhoeverAsksForAPointer) {
+TEST(FbxVector4, ConvertsToAPointerToItsFourDoubles) {
     FbxVector4 v(1.0, 2.0, 3.0, 4.0);
     double* raw = v;
     raw[1] = 20.0;
@@ -114,7 +114,7 @@ TEST(FbxColor, IsOpaqueBlackAtFirst) {
     EXPECT_EQ(FbxColor(FbxDouble4(0.1, 0.2, 0.3, 0.4)), FbxColor(0.1, 0.2, 0.3, 0.4));
 }
 
-TEST(FbxColor, HandsOutComponentsByIndex) {
+TEST(FbxColor, ReturnsComponentsByIndex) {
     FbxColor color;
     for (int i = 0; i < 4; ++i) {
         color[i] = i;

@@ -41,7 +41,7 @@ std::set<std::thread::id> threadsAtWork() {
     return threads;
 }
 
-TEST_F(Parallel, StartsNoThreadUnlessToldTo) {
+TEST_F(Parallel, StartsNoThreadByDefault) {
     extensions::setMaximumThreads(1);
     EXPECT_EQ(threadsAtWork(), std::set<std::thread::id>{std::this_thread::get_id()});
     extensions::setMaximumThreads(-5);
@@ -148,7 +148,7 @@ TEST_F(Parallel, GoesOnAheadWhenWhatIsReadyIsTaken) {
     FAIL() << "threads end before all is done";
 }
 
-TEST_F(Parallel, EndsWhenNobodyTakesWhatIsReady) {
+TEST_F(Parallel, EndsWhenResultsAreNotTaken) {
     WorkAhead work(std::vector<std::size_t>(100, 1), 1, [](std::size_t) {});
     std::size_t most = 1;
     for (int i = 0; i < 1000 && most == 1; ++i)

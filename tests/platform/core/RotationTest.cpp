@@ -235,7 +235,7 @@ TEST(RotationQuaternion, GivesTheAnglesOfEveryOrder) {
     }
 }
 
-TEST(RotationQuaternion, StandsForTheIdentityWhenZero) {
+TEST(RotationQuaternion, IsTheIdentityWhenZero) {
     const Axes identity = {{{1.0, 0.0, 0.0}, {0.0, 1.0, 0.0}, {0.0, 0.0, 1.0}}};
     EXPECT_EQ(detail::axesFromQuaternion(FbxQuaternion(0.0, 0.0, 0.0, 0.0)), identity);
     EXPECT_EQ(detail::axesFromQuaternion(FbxQuaternion(0.0, 0.0, 0.0, 5.0)), identity);
@@ -253,7 +253,7 @@ TEST(RotationSlerp, TurnsAtConstantSpeedOnTheShorterWay) {
     }
 }
 
-TEST(RotationSlerp, StandsStillBetweenEqualRotations) {
+TEST(RotationSlerp, IsConstantBetweenEqualRotations) {
     const FbxQuaternion q = detail::quaternionFromEuler(FbxVector4(10.0, 20.0, 30.0), eEulerXYZ);
     EXPECT_NEAR((detail::slerp(q, q, 0.3) - q).Length(), 0.0, kRoundTrip);
     EXPECT_NEAR((detail::slerp(q, -q, 0.3) - q).Length(), 0.0, kRoundTrip);

@@ -129,7 +129,7 @@ TEST(Connections, BreaksACycleAtItsFirstModel) {
     EXPECT_TRUE(warnsOf(*document, "\"m1\" is its own ancestor"));
 }
 
-TEST(Connections, BreaksACycleThatOthersHangOn) {
+TEST(Connections, BreaksACycleWithDescendants) {
     const auto document = modelsAnd({1, 2, 3, 4}, R"(
         C: "OO",1,2
         C: "OO",2,3

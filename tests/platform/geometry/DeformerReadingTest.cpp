@@ -193,7 +193,7 @@ TEST_F(DeformerReading, CompletesFullWeightsThatAreTooFew) {
     EXPECT_THAT(fullWeights(*channel), ElementsAre(10, 50, 75, 100));
 }
 
-TEST_F(DeformerReading, KeepsTheFileForAClusterThatNobodyHasAsked) {
+TEST_F(DeformerReading, KeepsTheFileForAClusterThatWasNotAccessed) {
     auto* cluster = make<FbxCluster>();
     {
         const auto document = documentOf("Indexes: *1 { a: 3 }\nWeights: *1 { a: 0.5 }");

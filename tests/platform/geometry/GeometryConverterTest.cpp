@@ -219,7 +219,7 @@ TEST_F(GeometryConverter, GivesASurfaceShrunkToAPointNormalsOfZero) {
     EXPECT_EQ(normal, FbxVector4(0, 0, 0, 1));
 }
 
-TEST_F(GeometryConverter, ConvertsASurfaceThatStillStandsInItsFile) {
+TEST_F(GeometryConverter, ConvertsASurfaceWhoseArraysAreStillInTheFile) {
     auto* surface = read<FbxNurbsSurface>(R"(
         NurbsSurfaceOrder: 2,2
         Dimensions: 2,2
@@ -555,7 +555,7 @@ TEST_F(GeometryConverter, FillsTheMeshOfAReplacedSurfaceWithWhatOneBesideItHas) 
     EXPECT_EQ(late->GetLayer(0)->GetNormals()->GetDirectArray().GetCount(), late->GetPolygonVertexCount());
 }
 
-TEST_F(GeometryConverter, FreesASurfaceWhoseMeshWasNeverAskedFor) {
+TEST_F(GeometryConverter, FreesASurfaceWhoseMeshWasNeverAccessed) {
     FbxMesh* mesh = converted(bilinear(3));
     const std::size_t objects = manager->data().objects.size();
 

@@ -238,7 +238,7 @@ TEST_F(LayerReading, CountsTheFirstOfElementsWithTheSameNumber) {
     EXPECT_EQ(mesh->GetLayer(0)->GetUVs()->GetDirectArray().GetAt(0), FbxVector2(0, 0));
 }
 
-TEST_F(LayerReading, DoesNotBelieveNumbersOfLayersBeyondReason) {
+TEST_F(LayerReading, IgnoresImplausibleLayerNumbers) {
     const std::string uv = element("LayerElementUV", "ByVertice", "Direct", kUvs, 2000000000);
     FbxMesh* mesh = triangle(uv + layer(1000000000, {{"LayerElementUV", 2000000000}}) + layer(-1, {}));
 
@@ -261,7 +261,7 @@ TEST_F(LayerReading, IgnoresEntriesForElementsThatAreNotThere) {
     EXPECT_EQ(mesh->GetLayer(0)->GetUVs(), nullptr);
 }
 
-TEST_F(LayerReading, LeavesArraysInTheFileUntilSomebodyAsks) {
+TEST_F(LayerReading, LeavesArraysInTheFileUntilTheFirstAccess) {
     FbxMesh* mesh = triangle(element("LayerElementUV", "ByPolygonVertex", "IndexToDirect", kUvs + "\n" + kUvIndex));
     const FbxLayerElementUV* uvs = mesh->GetLayer(0)->GetUVs();
     ASSERT_NE(uvs, nullptr);
@@ -272,7 +272,7 @@ TEST_F(LayerReading, LeavesArraysInTheFileUntilSomebodyAsks) {
     EXPECT_TRUE(uvs->GetIndexArray().items().isPending()) << "each array for itself";
 }
 
-TEST_F(LayerReading, KeepsTheFileForArraysThatNobodyHasAskedFor) {
+TEST_F(LayerReading, KeepsTheFileForArraysThatWereNotAccessed) {
     FbxMesh* mesh = make<FbxMesh>();
     std::weak_ptr<const fbxsdk::detail::Document> watched;
     {
@@ -290,7 +290,7 @@ TEST_F(LayerReading, KeepsTheFileForArraysThatNobodyHasAskedFor) {
     EXPECT_TRUE(watched.expired());
 }
 
-TEST_F(LayerReading, CutsArraysWhenAPolygonIsRemovedBeforeTheyWereAskedFor) {
+TEST_F(LayerReading, ShortensArraysWhenAPolygonIsRemovedBeforeTheyWereAccessed) {
     FbxMesh* mesh = read<FbxMesh>(
         "Vertices: *9 { a: 0,0,0, 1,0,0, 0,1,0 }\n"
         "PolygonVertexIndex: *6 { a: 0,1,-3,2,1,-1 }\n" +

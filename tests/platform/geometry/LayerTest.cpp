@@ -157,7 +157,7 @@ TEST_F(FbxLayerTest, IsCountedByWhatItHolds) {
     EXPECT_EQ(mesh->GetLayerCount(FbxLayerElement::eTypeCount), 0);
 }
 
-TEST_F(FbxLayerTest, IsGoneAfterClearingButItsElementsAreNot) {
+TEST_F(FbxLayerTest, IsDestroyedByClearingButItsElementsAreNot) {
     FbxMesh* mesh = make<FbxMesh>();
     mesh->CreateLayer();
     auto* normals = FbxLayerElementNormal::Create(mesh, "kept");
@@ -240,7 +240,7 @@ TEST_F(FbxLayerTest, EmptiesBothArraysOfAnElement) {
     EXPECT_EQ(uvs->GetIndexArray().GetCount(), 0);
 }
 
-TEST_F(FbxLayerTest, ThrowsWhenADamagedElementIsAskedForItsArrays) {
+TEST_F(FbxLayerTest, ThrowsWhenTheArraysOfADamagedElementAreAccessed) {
     auto* uvs = FbxLayerElementUV::Create(make<FbxMesh>(), "");
     fbxsdk::detail::LayerElementAccess::removeDirectArray(*uvs);
     fbxsdk::detail::LayerElementAccess::removeIndexArray(*uvs);

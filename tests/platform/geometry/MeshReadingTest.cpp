@@ -175,7 +175,7 @@ TEST_F(MeshReading, ComesBeforeChangesByTheHost) {
     EXPECT_EQ(mesh->GetControlPointAt(3), FbxVector4(9, 9, 9));
 }
 
-TEST_F(MeshReading, ReadsEdgesWhenTheyAreAskedFor) {
+TEST_F(MeshReading, ReadsEdgesWhenTheyAreAccessed) {
     FbxMesh* mesh = read<FbxMesh>(kFourPoints + "PolygonVertexIndex: *3 { a: 0,1,-3 }\nEdges: *3 { a: 0,1,2 }\n");
 
     EXPECT_THAT(std::vector<int>(mesh->edges().begin(), mesh->edges().end()), ElementsAre(0, 1, 2));

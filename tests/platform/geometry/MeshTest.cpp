@@ -69,7 +69,7 @@ TEST_F(FbxMeshTest, HasTheDefaultsOfItsClass) {
     EXPECT_TRUE(mesh->ReceiveShadow.Get());
 }
 
-TEST_F(FbxMeshTest, MakesExactlyThePointsAskedForAtTheOrigin) {
+TEST_F(FbxMeshTest, CreatesExactlyTheRequestedPointsAtTheOrigin) {
     FbxMesh* mesh = make<FbxMesh>();
     mesh->InitControlPoints(3);
     mesh->SetControlPointAt(FbxVector4(1, 2, 3), 0);
@@ -131,7 +131,7 @@ TEST_F(FbxMeshTest, KeepsPolygonsOneAfterTheOther) {
     EXPECT_EQ(mesh->GetPolygonVertices()[4], 3);
 }
 
-TEST_F(FbxMeshTest, AnswersOutOfRangeWithNothing) {
+TEST_F(FbxMeshTest, ReturnsNothingOutOfRange) {
     FbxMesh* mesh = quadAndTriangle();
 
     for (const int polygon : {-1, 2, 1000000}) {
@@ -332,7 +332,7 @@ TEST_F(FbxMeshTest, RemovesAPolygonWithWhatBelongsToIt) {
     EXPECT_THAT(itemsOf(materials->GetIndexArray()), ElementsAre(7, 9)) << "cut once, although it is in two layers";
 }
 
-TEST_F(FbxMeshTest, StandsOnTheNodesThatHaveIt) {
+TEST_F(FbxMeshTest, IsTheAttributeOfSeveralNodes) {
     FbxMesh* mesh = make<FbxMesh>();
     FbxNode* node = make<FbxNode>();
     FbxNode* instance = make<FbxNode>();

@@ -190,7 +190,7 @@ INSTANTIATE_TEST_SUITE_P(Readings, SoundStoredMesh,
                                     std::to_string(suite.param.threads);
                          });
 
-TEST_F(StoredMesh, GoesWhileOtherThreadsReadIt) {
+TEST_F(StoredMesh, IsDestroyedWhileOtherThreadsReadIt) {
     mStorage = Storage::compressed;
     extensions::setMaximumThreads(3);
     for (int round = 0; round < 5; ++round) {

@@ -284,7 +284,7 @@ TEST_P(GeometryWriting, GivesOneMaterialForAllTheFirstNumber) {
     EXPECT_EQ(itemsOf(back->GetLayer(0)->GetMaterials()->GetIndexArray()), std::vector<int>({0}));
 }
 
-TEST_P(GeometryWriting, LeavesOutWhatCountsEdgesThatNobodyKnows) {
+TEST_P(GeometryWriting, LeavesOutElementsByEdgeOfAMeshWithoutEdges) {
     FbxMesh* mesh = addMesh();
     auto* smoothing = FbxLayerElementSmoothing::Create(mesh, "");
     smoothing->SetMappingMode(Element::eByEdge);
@@ -448,7 +448,7 @@ TEST_P(ShapeWriting, KeepsInBetweensWhereFilesHaveThem) {
     expectPoint(backChannel->GetTargetShape(inlined ? 0 : 1)->GetControlPointAt(3), 3, 0.1 * 3 + 5, -3);
 }
 
-TEST_P(ShapeWriting, TellsShapesOfOneNameApart) {
+TEST_P(ShapeWriting, DistinguishesShapesOfOneName) {
     FbxMesh* mesh = addMesh();
     FbxBlendShape* blendShape = make<FbxBlendShape>("blend");
     mesh->AddDeformer(blendShape);

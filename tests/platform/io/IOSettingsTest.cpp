@@ -86,7 +86,7 @@ TEST_F(FbxIOSettingsTest, ShareNothingWithOthers) {
     EXPECT_TRUE(settings()->GetBoolProp(IMP_FBX_LINK, false));
 }
 
-TEST_F(FbxIOSettingsTest, AreThoseOfTheManagerUntilTheyDie) {
+TEST_F(FbxIOSettingsTest, AreThoseOfTheManagerUntilTheyAreDestroyed) {
     EXPECT_EQ(manager->GetIOSettings(), nullptr);
     FbxIOSettings* made = settings();
 

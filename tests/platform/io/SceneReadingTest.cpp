@@ -101,7 +101,7 @@ TEST_F(SceneReadingTest, AQuestionThatReadsPropertiesChangesNothing) {
     EXPECT_EQ(manager->data().revision, before);
 }
 
-TEST_F(SceneReadingTest, ANewPropertyStandsBehindThoseOfTheFile) {
+TEST_F(SceneReadingTest, ANewPropertyFollowsThoseOfTheFile) {
     read(model(1, "a", kTwoProperties), "C: \"OO\",1,0");
 
     const FbxProperty made = FbxProperty::Create(child(), FbxIntDT, "made");
@@ -120,7 +120,7 @@ TEST_F(SceneReadingTest, AnObjectThatLeftItsSceneKeepsItsProperties) {
     EXPECT_EQ(node->LclTranslation.Get(), FbxDouble3(1, 2, 3));
 }
 
-TEST_F(SceneReadingTest, HangsNodesInTheOrderOfTheirConnections) {
+TEST_F(SceneReadingTest, ParentsNodesInTheOrderOfTheirConnections) {
     read(model(1, "a") + model(2, "b") + model(3, "c"), "C: \"OO\",3,0\nC: \"OO\",1,0\nC: \"OO\",2,1");
 
     ASSERT_EQ(scene->GetRootNode()->GetChildCount(), 2);
@@ -252,7 +252,7 @@ TEST_F(SceneReadingTest, ReadsTheKeysOfACurveAlsoWhenItsSceneIsGone) {
     EXPECT_EQ(late->Evaluate(seconds(1)), 5.0F);
 }
 
-TEST_F(SceneReadingTest, ChangesTheKeysOfACurveThatNobodyHasAskedFor) {
+TEST_F(SceneReadingTest, ChangesTheKeysOfACurveThatWasNotAccessed) {
     read(curve(1, 3, 5), "");
     auto* changed = scene->GetSrcObject<FbxAnimCurve>();
     ASSERT_NE(changed, nullptr);

@@ -172,7 +172,7 @@ TEST_P(SceneWriting, KeepsAnEmptyName) {
     EXPECT_STREQ(childOf(copy)->GetName(), "");
 }
 
-TEST_P(SceneWriting, TellsNodesOfOneNameApart) {
+TEST_P(SceneWriting, DistinguishesNodesOfOneName) {
     addNode("same")->LclTranslation.Set(FbxDouble3(1, 0, 0));
     addNode("same")->LclTranslation.Set(FbxDouble3(2, 0, 0));
     addNode("same_ncl1_1")->LclTranslation.Set(FbxDouble3(3, 0, 0));
@@ -657,7 +657,7 @@ TEST_P(SceneWriting, LeavesTheSceneAsItWas) {
     EXPECT_EQ(node->GetParent(), scene->GetRootNode());
 }
 
-TEST_P(SceneWriting, WritesNodesThatHangNowhere) {
+TEST_P(SceneWriting, WritesUnparentedNodes) {
     make<FbxNode>("adrift");
 
     FbxScene* copy = writeAndRead();

@@ -230,7 +230,7 @@ TEST_F(WrittenRecords, NameAShadingModelOnce) {
     EXPECT_THAT(propertyNames(object(records(kOldText), "Material", "")), testing::Contains("ShadingModel"));
 }
 
-TEST_F(WrittenRecords, OfOldFilesStandInTheOrderOfTheirKinds) {
+TEST_F(WrittenRecords, OfOldFilesAreInTheOrderOfTheirKinds) {
     auto* mesh = make<FbxMesh>("mesh");
     mesh->AddDeformer(make<FbxSkin>("skin"));
     addNode("mesh", mesh)->AddMaterial(make<FbxSurfacePhong>("material"));

@@ -86,7 +86,7 @@ TEST_F(FbxCollectionTest, MayHoldOneObjectInManyAndCollectionsInEachOther) {
     EXPECT_TRUE(other->IsMember(collection));
 }
 
-TEST_F(FbxCollectionTest, ForgetsMembersThatDie) {
+TEST_F(FbxCollectionTest, ForgetsDestroyedMembers) {
     FbxNode* node = make<FbxNode>("node");
     collection->AddMember(node);
     collection->AddMember(make<FbxCamera>("camera"));

@@ -22,7 +22,7 @@ TEST(FbxManagerTest, GivesWhatItHas) {
     manager->Destroy();
 }
 
-TEST(FbxManagerTest, KeepsTheSettingsItIsGivenUntilTheyDie) {
+TEST(FbxManagerTest, KeepsTheSettingsItIsGivenUntilTheyAreDestroyed) {
     FbxManager* manager = FbxManager::Create();
     FbxIOSettings* settings = FbxIOSettings::Create(manager, IOSROOT);
     manager->SetIOSettings(settings);
@@ -48,7 +48,7 @@ TEST(FbxManagerTest, LivesBesideOthers) {
     second->Destroy();
 }
 
-TEST(FbxManagerTest, TakesObjectsInEveryStateAlong) {
+TEST(FbxManagerTest, DestroysObjectsInEveryState) {
     FbxManager* manager = FbxManager::Create();
     FbxScene* scene = FbxScene::Create(manager, "scene");
     FbxScene* other = FbxScene::Create(manager, "other");
@@ -72,7 +72,7 @@ TEST(FbxManagerTest, TakesObjectsInEveryStateAlong) {
     SUCCEED(); // a sanitizer would report it
 }
 
-TEST(FbxManagerTest, TakesTenThousandConnectedObjectsAlong) {
+TEST(FbxManagerTest, DestroysTenThousandConnectedObjects) {
     FbxManager* manager = FbxManager::Create();
     FbxScene* scene = FbxScene::Create(manager, "scene");
     FbxNode* parent = scene->GetRootNode();

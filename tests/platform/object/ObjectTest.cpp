@@ -320,7 +320,7 @@ TEST_F(FbxObjectTest, LeavesTheSceneWhenItIsCutOff) {
 
 // Destruction.
 
-TEST_F(FbxObjectTest, IsCutFromEverythingWhenItDies) {
+TEST_F(FbxObjectTest, IsDisconnectedFromEverythingWhenDestroyed) {
     FbxObject* target = loose("target");
     FbxNode* node = make<FbxNode>("node");
     FbxObject* doomed = loose("doomed");
@@ -337,7 +337,7 @@ TEST_F(FbxObjectTest, IsCutFromEverythingWhenItDies) {
     EXPECT_EQ(source->GetDstObjectCount(), 1);
 }
 
-TEST_F(FbxObjectTest, CutsTheConnectionsOfItsPropertiesWhenItDies) {
+TEST_F(FbxObjectTest, RemovesTheConnectionsOfItsPropertiesWhenDestroyed) {
     FbxNode* doomed = FbxNode::Create(manager, "doomed");
     FbxNode* other = FbxNode::Create(manager, "other");
     other->LclTranslation.ConnectSrcProperty(doomed->LclTranslation);
@@ -349,7 +349,7 @@ TEST_F(FbxObjectTest, CutsTheConnectionsOfItsPropertiesWhenItDies) {
     EXPECT_EQ(other->GetDstPropertyCount(), 0);
 }
 
-TEST_F(FbxObjectTest, LeavesItsSourcesAliveUnlessToldOtherwise) {
+TEST_F(FbxObjectTest, KeepsItsSourcesByDefault) {
     FbxObject* target = loose("target");
     FbxObject* source = loose("source");
     target->ConnectSrcObject(source);
@@ -360,7 +360,7 @@ TEST_F(FbxObjectTest, LeavesItsSourcesAliveUnlessToldOtherwise) {
     EXPECT_EQ(source->GetDstObjectCount(), 0);
 }
 
-TEST_F(FbxObjectTest, TakesItsSourcesAndTheirsAlongWhenTold) {
+TEST_F(FbxObjectTest, DestroysItsSourcesAndTheirsOnRequest) {
     FbxNode* parent = make<FbxNode>("parent");
     FbxNode* child = make<FbxNode>("child");
     FbxNode* bystander = make<FbxNode>("bystander");
@@ -376,7 +376,7 @@ TEST_F(FbxObjectTest, TakesItsSourcesAndTheirsAlongWhenTold) {
     EXPECT_EQ(bystander->GetMaterialCount(), 1);
 }
 
-TEST_F(FbxObjectTest, DiesOnceWhenItFeedsItself) {
+TEST_F(FbxObjectTest, IsDestroyedOnceWhenItIsItsOwnSource) {
     FbxObject* a = loose("a");
     FbxObject* b = loose("b");
     a->ConnectSrcObject(b);
@@ -388,7 +388,7 @@ TEST_F(FbxObjectTest, DiesOnceWhenItFeedsItself) {
     EXPECT_EQ(scene->GetNodeCount(), 1);
 }
 
-TEST_F(FbxObjectTest, TakesAChainOfAHundredThousandAlong) {
+TEST_F(FbxObjectTest, DestroysAChainOfAHundredThousandSources) {
     FbxObject* top = loose("top");
     FbxObject* last = top;
     for (int i = 0; i < 100'000; ++i) {
@@ -402,7 +402,7 @@ TEST_F(FbxObjectTest, TakesAChainOfAHundredThousandAlong) {
     SUCCEED(); // neither a stack overflow nor a sanitizer report
 }
 
-TEST_F(FbxObjectTest, TakesAWholeSceneAlongWhenTheSceneIsASource) {
+TEST_F(FbxObjectTest, DestroysAWholeSceneThatIsASource) {
     FbxObject* owner = loose("owner");
     FbxScene* owned = FbxScene::Create(manager, "owned");
     FbxNode* node = FbxNode::Create(owned, "node");

@@ -59,7 +59,7 @@ TEST_F(FbxPropertyTest, IsFoundByItsNameAsWritten) {
     EXPECT_FALSE(node->FindProperty(nullptr).IsValid());
 }
 
-TEST_F(FbxPropertyTest, IsFoundInAnyCaseWhenAskedFor) {
+TEST_F(FbxPropertyTest, IsFoundInAnyCaseOnRequest) {
     EXPECT_EQ(node->FindProperty("LCL translation", /*pCaseSensitive=*/false), node->LclTranslation);
     const FbxProperty dynamic = create(FbxIntDT, "MyÄ");
     EXPECT_EQ(node->FindProperty("mYÄ", false), dynamic);
@@ -126,7 +126,7 @@ TEST_F(FbxPropertyTest, KeepsValuesApartHoweverManyAreChanged) {
 
 // Dynamic properties.
 
-TEST_F(FbxPropertyTest, MadeAnewHoldsZeroOfItsType) {
+TEST_F(FbxPropertyTest, IsZeroOfItsTypeWhenCreated) {
     EXPECT_EQ(create(FbxIntDT, "int").Get<FbxInt>(), 0);
     EXPECT_EQ(create(FbxDoubleDT, "double").Get<FbxDouble>(), 0.0);
     EXPECT_EQ(create(FbxDouble4DT, "double4").Get<FbxDouble4>(), FbxDouble4(0, 0, 0, 0));
@@ -135,7 +135,7 @@ TEST_F(FbxPropertyTest, MadeAnewHoldsZeroOfItsType) {
     EXPECT_EQ(create(FbxTimeDT, "time").Get<FbxTime>(), FbxTime(0));
 }
 
-TEST_F(FbxPropertyTest, MadeAnewIsNeitherAnimatableNorUserDefined) {
+TEST_F(FbxPropertyTest, IsNeitherAnimatableNorUserDefinedWhenCreated) {
     FbxProperty made = create(FbxDoubleDT, "x");
 
     EXPECT_TRUE(made.IsValid());
@@ -167,7 +167,7 @@ TEST_F(FbxPropertyTest, OfTheClassIsFoundWhenMadeAgain) {
     EXPECT_EQ(again, node->LclScaling);
 }
 
-TEST_F(FbxPropertyTest, MayBeDoubledWhenNobodyChecks) {
+TEST_F(FbxPropertyTest, MayBeDuplicatedWithoutTheCheck) {
     bool found = true;
     FbxProperty first = create(FbxIntDT, "x");
     FbxProperty second = FbxProperty::Create(node, FbxIntDT, "x", "", /*pCheckForDup=*/false, &found);
@@ -236,7 +236,7 @@ TEST_F(FbxPropertyTest, FallsBackToItsNameForALabel) {
 
 // Compounds.
 
-TEST_F(FbxPropertyTest, StandsBelowItsCompound) {
+TEST_F(FbxPropertyTest, IsBelowItsCompound) {
     FbxProperty compound = create(FbxCompoundDT, "Group");
     FbxProperty first = FbxProperty::Create(compound, FbxDoubleDT, "First");
     FbxProperty nested = FbxProperty::Create(compound, FbxCompoundDT, "Nested");

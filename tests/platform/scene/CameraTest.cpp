@@ -126,7 +126,7 @@ TEST_F(FbxCameraTest, SqueezesTheWidthAlone) {
     EXPECT_DOUBLE_EQ(camera->ComputeFocalLength(90.0), 0.612 * 25.4 / 2);
 }
 
-TEST_F(FbxCameraTest, StandsLensesThatDoNotExist) {
+TEST_F(FbxCameraTest, ToleratesInvalidLenses) {
     const double infinity = std::numeric_limits<double>::infinity();
 
     EXPECT_EQ(camera->ComputeFocalLength(0.0), infinity);
@@ -138,7 +138,7 @@ TEST_F(FbxCameraTest, StandsLensesThatDoNotExist) {
     EXPECT_EQ(camera->ComputeFieldOfView(35.0), 0.0);
 }
 
-TEST_F(FbxCameraTest, StandsAnApertureModeThatIsNone) {
+TEST_F(FbxCameraTest, ToleratesAnInvalidApertureMode) {
     camera->ApertureMode.FbxProperty::Set(FbxEnum{77});
 
     EXPECT_EQ(static_cast<int>(camera->GetApertureMode()), 77);

@@ -91,7 +91,7 @@ TEST_F(FbxGlobalCameraSettingsTest, GiveAllSevenTheSameLens) {
     }
 }
 
-TEST_F(FbxGlobalCameraSettingsTest, HangEachCameraOnANodeOfItsOwnOutsideTheTree) {
+TEST_F(FbxGlobalCameraSettingsTest, AttachEachCameraToAnUnparentedNodeOfItsOwn) {
     settings().CreateProducerCameras();
 
     for (const Expected& row : kExpected) {

@@ -98,7 +98,7 @@ TEST_F(FbxGlobalSettingsTest, KeepUnitsAsCentimetres) {
     EXPECT_EQ(settings().GetOriginalSystemUnit(), FbxSystemUnit::m);
 }
 
-TEST_F(FbxGlobalSettingsTest, TakeAUnitThatIsNoneForCentimetres) {
+TEST_F(FbxGlobalSettingsTest, TakeAnInvalidUnitForCentimetres) {
     for (const double wrong : {0.0, -2.54, 1e300, static_cast<double>(INFINITY), static_cast<double>(NAN)}) {
         property("UnitScaleFactor").Set(wrong);
         EXPECT_EQ(settings().GetSystemUnit(), FbxSystemUnit::cm) << wrong;

@@ -76,7 +76,7 @@ TEST_F(FbxLightTest, GivesItsEnumerationsAsNumbers) {
     EXPECT_EQ(light->FindProperty("DecayType").Get<FbxEnum>(), 3);
 }
 
-TEST_F(FbxLightTest, StandsALightTypeThatIsNone) {
+TEST_F(FbxLightTest, ToleratesAnInvalidLightType) {
     light->FindProperty("LightType").Set(FbxEnum{-12345});
 
     EXPECT_EQ(light->LightType.Get<FbxEnum>(), -12345);

@@ -29,7 +29,7 @@ TEST_F(FbxNodeAttributeTest, NumbersItsKinds) {
     EXPECT_EQ(FbxNodeAttribute::eLine, 21);
 }
 
-TEST_F(FbxNodeAttributeTest, StandsForUnknownKinds) {
+TEST_F(FbxNodeAttributeTest, RepresentsUnknownKinds) {
     FbxNodeAttribute* attribute = make<FbxNodeAttribute>("unknown");
 
     EXPECT_EQ(attribute->GetAttributeType(), FbxNodeAttribute::eUnknown);

@@ -157,7 +157,7 @@ TEST_F(NodeEvaluationTest, ShiftsByTheRotationOffsetBeforeTheTurn) {
     EXPECT_NEAR(origin[2], 7.0, kMatrixTolerance);
 }
 
-TEST_F(NodeEvaluationTest, TurnsTheScalingOffsetAlong) {
+TEST_F(NodeEvaluationTest, RotatesTheScalingOffset) {
     FbxNode* node = addNode();
     node->SetScalingOffset(kSet, FbxVector4(5, 0, 0));
     node->LclRotation.Set(FbxDouble3(0, 0, 90));

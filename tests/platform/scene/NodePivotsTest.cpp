@@ -124,7 +124,7 @@ TEST_F(NodePivotsTest, KeepsTheRotationOrderOfEachSet) {
     EXPECT_EQ(order, FbxEuler::eOrderSphericXYZ);
 }
 
-TEST_F(NodePivotsTest, TakesARotationOrderThatIsNoneForXyz) {
+TEST_F(NodePivotsTest, TakesAnInvalidRotationOrderForXyz) {
     for (const FbxEnum wrong : {-1, 7, 100, INT_MAX, INT_MIN}) {
         node->FindProperty("RotationOrder").Set(wrong);
         FbxEuler::EOrder order = FbxEuler::eOrderZYX;

@@ -263,7 +263,7 @@ TEST_F(NodeTreeTest, FindsTheUpperOfTwoNodesOfOneNameInABranch) {
     EXPECT_EQ(upper->FindChild("雪"), lower);
 }
 
-TEST_F(NodeTreeTest, StandsAChainOfAHundredThousandNodes) {
+TEST_F(NodeTreeTest, HandlesAChainOfAHundredThousandNodes) {
     constexpr int kDepth = 100000;
     FbxNode* top = node("top");
     FbxNode* bottom = top;
@@ -294,7 +294,7 @@ TEST_F(NodeTreeTest, BuildsADeepChainFromPairsWithoutWalkingItEachTime) {
     EXPECT_EQ(top->GetChildCount(true), 2 * kPairs);
 }
 
-TEST_F(NodeTreeTest, StandsAHundredThousandChildrenOfOneMesh) {
+TEST_F(NodeTreeTest, HandlesAHundredThousandChildrenOfOneMesh) {
     constexpr int kCount = 100000;
     FbxNode* parent = node();
     FbxMesh* mesh = make<FbxMesh>();

@@ -112,7 +112,7 @@ TEST_F(FbxSceneTest, FallsBackToTheFirstStackWhenTheCurrentOneGoes) {
     EXPECT_EQ(scene->GetCurrentAnimationStack(), nullptr);
 }
 
-TEST_F(FbxSceneTest, TakesItsMembersAlongWhenItDies) {
+TEST_F(FbxSceneTest, DestroysItsMembersWhenDestroyed) {
     FbxNode* outside = FbxNode::Create(manager, "outside");
     FbxScene* doomed = FbxScene::Create(manager, "doomed");
     FbxNode* node = FbxNode::Create(doomed, "node");
@@ -127,7 +127,7 @@ TEST_F(FbxSceneTest, TakesItsMembersAlongWhenItDies) {
     EXPECT_EQ(outside->LclRotation.GetSrcPropertyCount(), 0);
 }
 
-TEST_F(FbxSceneTest, LeavesMembersOfOtherScenesAloneWhenItDies) {
+TEST_F(FbxSceneTest, KeepsMembersOfOtherScenesWhenDestroyed) {
     FbxNode* node = make<FbxNode>("node");
     FbxScene* doomed = FbxScene::Create(manager, "doomed");
     doomed->ConnectSrcObject(node);
@@ -159,7 +159,7 @@ TEST_F(FbxSceneTest, EntersAndLeavesAHundredThousandNodes) {
     EXPECT_EQ(root->GetChildCount(), 0);
 }
 
-TEST_F(FbxSceneTest, KeepsWhatHangsBelowARootThatShallDie) {
+TEST_F(FbxSceneTest, KeepsTheChildrenOfARootThatIsToBeDestroyed) {
     FbxNode* node = make<FbxNode>("node");
     scene->GetRootNode()->AddChild(node);
 

@@ -109,7 +109,7 @@ TEST_F(CacheInvalidationTest, SeesTheCurrentStackChange) {
     EXPECT_EQ(x(), 11.0);
 }
 
-TEST_F(CacheInvalidationTest, SeesObjectsDie) {
+TEST_F(CacheInvalidationTest, NotesThatObjectsAreDestroyed) {
     FbxAnimCurve* added = keys(parent->LclTranslation, layer, "X", {{0, 3}});
     EXPECT_EQ(x(), 13.0);
     added->Destroy();

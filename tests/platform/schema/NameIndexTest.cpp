@@ -44,7 +44,7 @@ TEST(NameIndex, TakesTheFirstOfSeveralRowsOfOneName) {
     EXPECT_EQ(find(indexOf(rows), "same"), 1);
 }
 
-TEST(NameIndex, TellsNamesApartThatDifferInTheMiddleOnly) {
+TEST(NameIndex, DistinguishesNamesThatDifferInTheMiddleOnly) {
     std::vector<std::string> names;
     for (int i = 0; i < 100; ++i)
         names.push_back("12345678 " + std::to_string(100 + i) + " 87654321");

@@ -124,7 +124,7 @@ TEST(LegacyTakes, AStillChannelThatDiffersFromThePropertyIsKept) {
     EXPECT_TRUE(document->legacyCurves.empty());
 }
 
-TEST(LegacyTakes, AComponentMayStandAlone) {
+TEST(LegacyTakes, AComponentMayBeTheOnlyOne) {
     const auto document =
         documentWithTake(R"(Model: "Model::m" { Channel: "Transform" { Channel: "R" { )" + keyed("Y", 4) + "} } }");
     const DocumentObject* node = objectNamed(*document, "AnimationCurveNode", "R");
@@ -133,7 +133,7 @@ TEST(LegacyTakes, AComponentMayStandAlone) {
     EXPECT_EQ(numbersOf(node, "d|Y"), (Numbers{4}));
 }
 
-TEST(LegacyTakes, WithoutDefaultTheFirstKeyStandsIn) {
+TEST(LegacyTakes, WithoutDefaultTheFirstKeyIsUsed) {
     const auto document = documentWithTake(R"(Model: "Model::m" { Channel: "Visibility" { KeyCount: 1
         Key: 0,0.75,L } })");
     EXPECT_EQ(numbersOf(objectNamed(*document, "AnimationCurveNode", "Visibility"), "d|Visibility"), (Numbers{0.75}));
