@@ -84,9 +84,8 @@ Place expectedPlace(const Place& point, const Binding& binding, int frame) {
         const Place moved = {origin[0] + x * std::cos(angle) - y * std::sin(angle),
                              origin[1] + x * std::sin(angle) + y * std::cos(angle),
                              point[2] + static_cast<double>(boneRise(bone, frame))};
-        for (std::size_t axis = 0; axis < sum.size(); ++axis) {
+        for (std::size_t axis = 0; axis < sum.size(); ++axis)
             sum[axis] += moved[axis] * binding.weights[n];
-        }
         total += binding.weights[n];
     }
     return {sum[0] / total, sum[1] / total, sum[2] / total};
@@ -114,7 +113,8 @@ fbxsdk::FbxNode* addBone(fbxsdk::FbxScene* scene, fbxsdk::FbxAnimLayer* layer, i
     scene->GetRootNode()->AddChild(node);
     const Place origin = boneOrigin(bone);
     node->LclTranslation.Set({origin[0], origin[1], origin[2]});
-    keyEveryFrame(node->LclRotation, "Z", layer, [bone](int frame) { return boneTurn(bone, frame); });
+    keyEveryFrame(
+        node->LclRotation, "Z", layer, [bone](int frame) { return boneTurn(bone, frame); });
     keyEveryFrame(node->LclTranslation, "Z", layer,
                   [bone, z = static_cast<float>(origin[2])](int frame) { return z + boneRise(bone, frame); });
     return node;
@@ -138,18 +138,16 @@ void addSkin(fbxsdk::FbxScene* scene, fbxsdk::FbxMesh* mesh, fbxsdk::FbxAnimLaye
     }
     for (const int vertex : order) {
         const Binding& binding = skin.bindings[static_cast<std::size_t>(vertex)];
-        for (std::size_t n = 0; n < binding.bones.size(); ++n) {
+        for (std::size_t n = 0; n < binding.bones.size(); ++n)
             clusters[static_cast<std::size_t>(binding.bones[n])]->AddControlPointIndex(vertex, binding.weights[n]);
-        }
     }
     mesh->AddDeformer(deformer);
 }
 
 /// The node with the skinned mesh; null when the context cannot be initialised.
 fbxsdk::FbxNode* buildScene(Tarnell::Fbx::FbxSdk& sdk, const Skin& skin, const std::vector<int>& order) {
-    if (!sdk.initFbxSdkManager()) {
+    if (!sdk.initFbxSdkManager())
         return nullptr;
-    }
     fbxsdk::FbxScene* scene = sdk.getScene();
     scene->GetGlobalSettings().SetTimeMode(fbxsdk::FbxTime::eFrames24);
     sdk.initCreateAnimationStack();
@@ -205,11 +203,9 @@ public:
 
     /// Adds the bits of the frame deformed last to a hash (FNV-1a).
     [[nodiscard]] std::uint64_t digest(std::uint64_t value) const {
-        for (int i = 0; i < kVertices; ++i) {
-            for (int axis = 0; axis < 4; ++axis) {
+        for (int i = 0; i < kVertices; ++i)
+            for (int axis = 0; axis < 4; ++axis)
                 value = (value ^ std::bit_cast<std::uint64_t>(mPoints[i][axis])) * 1'099'511'628'211u;
-            }
-        }
         return value;
     }
 
@@ -271,9 +267,8 @@ std::vector<int> vertexOrder(bool mixed) {
     std::vector<int> order(kVertices);
     std::iota(order.begin(), order.end(), 0);
     std::mt19937 random(7);
-    for (std::size_t i = order.size(); mixed && i > 1; --i) {
+    for (std::size_t i = order.size(); mixed && i > 1; --i)
         std::swap(order[i - 1], order[random() % i]);
-    }
     return order;
 }
 
@@ -294,15 +289,13 @@ int main(int argc, char** argv) {
     std::uint64_t digest = 14'695'981'039'346'656'037u;
     for (int frame = 0; frame < kFrames; ++frame) {
         run.deform(frame);
-        if (!run.isRight(frame)) {
+        if (!run.isRight(frame))
             return 1;
-        }
         digest = run.digest(digest);
     }
     std::vector<double> seconds;
-    for (int frame = 0; frame < kFrames; ++frame) {
+    for (int frame = 0; frame < kFrames; ++frame)
         seconds.push_back(run.deform(frame));
-    }
     print(std::move(seconds), copyBandwidth(), digest);
     return 0;
 }

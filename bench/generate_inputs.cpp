@@ -236,9 +236,8 @@ void writeStack(Scene& scene, std::int64_t layer, std::int64_t ticks) {
     const std::int64_t stack = scene.newId();
     out.begin("AnimationStack").id(stack).name("Take 001", "AnimStack").text("").block();
     out.begin("Properties70").block();
-    for (const std::string_view name : {"LocalStop", "ReferenceStop"}) {
+    for (const std::string_view name : {"LocalStop", "ReferenceStop"})
         out.begin("P").text(name).text("KTime").text("Time").text("").id(ticks).end();
-    }
     out.end();
     out.end();
     out.begin("AnimationLayer").id(layer).name("BaseLayer", "AnimLayer").text("").block().end();
@@ -296,9 +295,8 @@ std::int64_t writeCurveNode(Scene& scene, std::int64_t layer, std::int64_t model
     FbxEmitter& out = scene.out;
     out.begin("AnimationCurveNode").id(id).name(name, "AnimCurveNode").text("").block();
     out.begin("Properties70").block();
-    for (const std::string& channel : channels) {
+    for (const std::string& channel : channels)
         out.begin("P").text(channel).text("Number").text("").text("A").real(0).end();
-    }
     out.end();
     out.end();
     scene.connect(id, layer);

@@ -19,9 +19,8 @@ class SharedArray {
 public:
     SharedArray() = default;
     SharedArray(const SharedArray& other) noexcept : mHeld(other.mHeld) {
-        if (mHeld != nullptr) {
+        if (mHeld != nullptr)
             mHeld->holders.fetch_add(1, std::memory_order_relaxed);
-        }
     }
     SharedArray(SharedArray&& other) noexcept : mHeld(std::exchange(other.mHeld, nullptr)) {}
     SharedArray& operator=(SharedArray other) noexcept {
@@ -29,9 +28,8 @@ public:
         return *this;
     }
     ~SharedArray() {
-        if (mHeld != nullptr && mHeld->holders.fetch_sub(1, std::memory_order_acq_rel) == 1) {
+        if (mHeld != nullptr && mHeld->holders.fetch_sub(1, std::memory_order_acq_rel) == 1)
             delete mHeld;
-        }
     }
 
     std::size_t size() const noexcept { return mHeld != nullptr ? std::max(mHeld->elements.size(), mHeld->filled) : 0; }
@@ -67,9 +65,8 @@ public:
     /// std::bad_alloc; the array is unchanged then.
     std::vector<Element>& own() {
         Held& held = ownAsStored();
-        if (held.elements.size() < held.filled) {
+        if (held.elements.size() < held.filled)
             held.elements.resize(held.filled, held.filler);
-        }
         held.filled = 0;
         return held.elements;
     }
@@ -95,11 +92,10 @@ private:
     explicit SharedArray(const Held& held) : mHeld(new Held{{1}, held.elements, held.filled, held.filler}) {}
 
     Held& ownAsStored() {
-        if (mHeld == nullptr) {
+        if (mHeld == nullptr)
             mHeld = new Held;
-        } else if (!isOwn()) {
+        else if (!isOwn())
             *this = SharedArray(*mHeld);
-        }
         return *mHeld;
     }
 

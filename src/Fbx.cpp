@@ -54,25 +54,21 @@ constexpr ReaderRow<TnFbxTransform> kReader<TnFbxTransform> = {&FbxSdk::getNumbe
 template <class Object>
 bool read(const Fbx& fbx, TnFbxReadInfo& info, Object** objects, int& count) {
     const CallScope call;
-    if (objects == nullptr) {
+    if (objects == nullptr)
         return fail("the pointer to the array of objects is null");
-    }
     *objects = nullptr;
     count = 0;
     if (info.getFidelity() == kFbxFidelityFaithful) {
         return info.getFileName().empty() ? fail("the read options have no file name")
                                           : faithful::readObjects(info, objects, count);
     }
-    if (!info.haveAnimationStack()) { // kept: the name is required, though the first stack is read in any case
+    if (!info.haveAnimationStack()) // kept: the name is required, though the first stack is read in any case
         return fail("the read options have no animation stack name");
-    }
-    if (info.getFileName().empty()) {
+    if (info.getFileName().empty())
         return fail("the read options have no file name");
-    }
     FbxSdk sdk;
-    if (!fbx.loadScene(info.getFileName(), sdk)) {
+    if (!fbx.loadScene(info.getFileName(), sdk))
         return false;
-    }
 
     const ReaderRow<Object>& row = kReader<Object>;
     count =
@@ -96,12 +92,10 @@ Fbx& Fbx::operator=(const Fbx& /*other*/) = default;
 
 bool Fbx::loadScene(const std::string& fileName, FbxSdk& sdk) const {
     const CallScope call;
-    if (fileName.empty()) {
+    if (fileName.empty())
         return fail("no file name is given");
-    }
-    if (!sdk.initFbxSdkManager()) {
+    if (!sdk.initFbxSdkManager())
         return false;
-    }
     if (!sdk.loadScene(fileName, /*convertGeometry*/ true)) {
         sdk.destroyFbxSdkManager();
         return false;
@@ -111,16 +105,13 @@ bool Fbx::loadScene(const std::string& fileName, FbxSdk& sdk) const {
 
 int Fbx::getNumberOfObjects(int count, bool allObjects, int nodeTypeMask, const std::string& objectName,
                             FbxSdk& sdk) const {
-    if (count < 0) {
+    if (count < 0)
         return 0;
-    }
-    if (allObjects) {
+    if (allObjects)
         return count;
-    }
     std::vector<std::string> names;
-    if (objectName.empty() || !sdk.getNodeNames(nodeTypeMask, names)) {
+    if (objectName.empty() || !sdk.getNodeNames(nodeTypeMask, names))
         return 0;
-    }
     return std::find(names.begin(), names.end(), objectName) != names.end() ? 1 : 0;
 }
 
@@ -128,9 +119,8 @@ bool Fbx::getAnimationStackNodeNames(const char* fileName, long nodeTypeMask, st
                                      std::vector<std::string>& nodeNames) const {
     const CallScope call;
     FbxSdk sdk;
-    if (!loadScene(fileName != nullptr ? fileName : "", sdk)) {
+    if (!loadScene(fileName != nullptr ? fileName : "", sdk))
         return false;
-    }
     const bool result = sdk.getAnimationStackNames(stackNames) && sdk.getNodeNames(nodeTypeMask, nodeNames);
     sdk.destroyFbxSdkManager();
     return result;
@@ -139,9 +129,8 @@ bool Fbx::getAnimationStackNodeNames(const char* fileName, long nodeTypeMask, st
 bool Fbx::getAnimationFrameRange(const char* fileName, float& start, float& end) const {
     const CallScope call;
     FbxSdk sdk;
-    if (!loadScene(fileName != nullptr ? fileName : "", sdk)) {
+    if (!loadScene(fileName != nullptr ? fileName : "", sdk))
         return false;
-    }
     const bool result = sdk.getAnimationFrameRange(start, end);
     sdk.destroyFbxSdkManager();
     return result;
@@ -175,32 +164,27 @@ bool Fbx::writeFile(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>&
                     const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                     const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const {
     const CallScope call;
-    if (info.getFileName().empty()) {
+    if (info.getFileName().empty())
         return fail("the write options have no file name");
-    }
     const bool faithfully = info.getFidelity() == kFbxFidelityFaithful;
-    if (!faithfully && info.getAnimationStackName().empty()) { // kept: required, though the stack has another name
+    if (!faithfully && info.getAnimationStackName().empty()) // kept: required, though the stack has another name
         return fail("the write options have no animation stack name");
-    }
     const auto place = detail::pointCachePlace(info.getFileName(), /*nodeName*/ "", /*extension*/ "");
     detail::NewFolders folders(std::string(place.folder)); // destroyed after the context, which removes its files
     if (faithfully) {
         const bool written = faithful::writeObjects(info, cameras, lights, transforms, nulls, meshes);
-        if (written) {
+        if (written)
             folders.keep();
-        }
         return written;
     }
     FbxSdk sdk;
-    if (!sdk.initFbxSdkManager()) {
+    if (!sdk.initFbxSdkManager())
         return false;
-    }
     sdk.letPointCachesAppearWithScene();
     const bool result = sdk.createScene(info, cameras, lights, transforms, nulls, meshes) && sdk.saveScene(info);
     sdk.destroyFbxSdkManager();
-    if (result) {
+    if (result)
         folders.keep();
-    }
     return result;
 }
 

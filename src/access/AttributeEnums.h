@@ -23,11 +23,9 @@ struct EnumRow {
 
 template <class Value, std::size_t kCount>
 constexpr Value lookUp(const EnumRow<Value> (&rows)[kCount], int number, Value otherwise) {
-    for (const EnumRow<Value>& row : rows) {
-        if (row.fbx == number) {
+    for (const EnumRow<Value>& row : rows)
+        if (row.fbx == number)
             return row.value;
-        }
-    }
     return otherwise;
 }
 

@@ -22,11 +22,9 @@ inline void warnAbout(const std::string& fileName, const std::string& sentence) 
 template <class HeaderInfo>
 void warnOfRepairs(const std::string& fileName, const HeaderInfo* header) {
     if constexpr (requires { header->mWarnings.begin(); }) {
-        if (header != nullptr) {
-            for (const fbxsdk::FbxString& warning : header->mWarnings) {
+        if (header != nullptr)
+            for (const fbxsdk::FbxString& warning : header->mWarnings)
                 warnAbout(fileName, warning.Buffer());
-            }
-        }
     }
 }
 

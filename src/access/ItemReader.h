@@ -40,9 +40,8 @@ void readRuns(int first, int count, Value* values, const RunAt& runAt) {
         const fbxsdk::extensions::ItemRun run = runAt(first + done);
         const int end = std::min(count, run.first + run.count - first);
         const char* bytes = run.at(first + done);
-        for (; done < end; ++done, bytes += run.itemBytes) {
+        for (; done < end; ++done, bytes += run.itemBytes)
             values[done] = loadItem<Value>(bytes);
-        }
     }
 }
 
@@ -64,20 +63,17 @@ public:
     /// False when there is no such item; the value is unchanged then.
     bool read(int index, Value& value) {
 #ifdef TARNELL_FBX_EXTERNAL_FBXSDK
-        if (index < 0 || index >= count()) {
+        if (index < 0 || index >= count())
             return false;
-        }
         value = mArray->GetAt(index);
         return true;
 #else
         if (!mRun.contains(index)) {
-            if (mArray == nullptr) {
+            if (mArray == nullptr)
                 return false;
-            }
             mRun = fbxsdk::extensions::itemRun(*mArray, index);
-            if (!mRun.contains(index)) {
+            if (!mRun.contains(index))
                 return false;
-            }
         }
         value = loadItem<Value>(mRun.at(index));
         return true;
@@ -87,9 +83,8 @@ public:
     /// Consecutive items, which must exist.
     void read(int first, int count, Value* values) {
 #ifdef TARNELL_FBX_EXTERNAL_FBXSDK
-        for (int i = 0; i < count; ++i) {
+        for (int i = 0; i < count; ++i)
             values[i] = mArray->GetAt(first + i);
-        }
 #else
         mRun = {};
         readRuns(first, count, values, [this](int index) { return fbxsdk::extensions::itemRun(*mArray, index); });
@@ -106,9 +101,8 @@ private:
 /// Consecutive control points, which must exist. Throws std::runtime_error when the file has been changed.
 inline void readControlPoints(fbxsdk::FbxGeometryBase& geometry, int first, int count, fbxsdk::FbxVector4* points) {
 #ifdef TARNELL_FBX_EXTERNAL_FBXSDK
-    for (int i = 0; i < count; ++i) {
+    for (int i = 0; i < count; ++i)
         points[i] = geometry.GetControlPointAt(first + i);
-    }
 #else
     readRuns(first, count, points,
              [&geometry](int index) { return fbxsdk::extensions::controlPointRun(geometry, index); });

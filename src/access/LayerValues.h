@@ -50,9 +50,8 @@ public:
     static ElementValues numbered(const fbxsdk::FbxLayerElementTemplate<Value>& element) {
         ElementValues values;
         values.mDirect = ItemReader<Value>(element.GetDirectArray());
-        if (element.GetReferenceMode() != fbxsdk::FbxLayerElement::eDirect) {
+        if (element.GetReferenceMode() != fbxsdk::FbxLayerElement::eDirect)
             values.mIndex = ItemReader<int>(element.GetIndexArray());
-        }
         return values;
     }
 

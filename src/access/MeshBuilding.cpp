@@ -37,9 +37,8 @@ template <class Array, class ValueAt>
 void fillArray(Array& array, int count, ValueAt valueAt) {
     array.SetCount(count);
     auto* items = array.GetLocked();
-    for (int i = 0; i < count; ++i) {
+    for (int i = 0; i < count; ++i)
         items[i] = valueAt(i);
-    }
     array.Release(&items);
 }
 
@@ -91,9 +90,8 @@ void addPolygons(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
     int polygonVertex = 0;
     for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon) {
         const int size = mesh.getPolygonVertexSize(polygon);
-        if (size <= 0) {
+        if (size <= 0)
             continue;
-        }
         target.BeginPolygon(/*pMaterial*/ -1, /*pTexture*/ -1, /*pGroup*/ -1, /*pLegacy*/ true);
         for (int corner = 0; corner < size; ++corner) {
             target.AddPolygon(mesh.getPointIndex(polygonVertex), /*pTextureUVIndex*/ -1);
@@ -104,9 +102,8 @@ void addPolygons(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
 }
 
 fbxsdk::FbxLayer* firstLayer(fbxsdk::FbxMesh& mesh) {
-    if (mesh.GetLayer(0) == nullptr) {
+    if (mesh.GetLayer(0) == nullptr)
         mesh.CreateLayer();
-    }
     return mesh.GetLayer(0);
 }
 
@@ -114,9 +111,8 @@ fbxsdk::FbxLayer* firstLayer(fbxsdk::FbxMesh& mesh) {
 
 bool detail::claimsTooManyCorners(const TnFbxMesh& mesh) {
     std::int64_t corners = 0;
-    for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon) {
+    for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon)
         corners += std::max(mesh.getPolygonVertexSize(polygon), 0);
-    }
     const bool fits = corners <= mesh.getNumberOfPolygonVertices() + kMostMissingCorners &&
                       corners <= std::numeric_limits<int>::max();
     return !fits;
@@ -125,18 +121,14 @@ bool detail::claimsTooManyCorners(const TnFbxMesh& mesh) {
 bool detail::buildMesh(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
     setPoints(mesh, target);
     fbxsdk::FbxLayer* layer = firstLayer(target);
-    if (layer == nullptr) {
+    if (layer == nullptr)
         return false;
-    }
-    if (mesh.getValidNormals()) {
+    if (mesh.getValidNormals())
         setNormals(mesh, target, *layer);
-    }
-    if (mesh.getValidUVs()) {
+    if (mesh.getValidUVs())
         setUVs(mesh, target, *layer);
-    }
-    if (mesh.getValidColours()) {
+    if (mesh.getValidColours())
         setColours(mesh, target, *layer);
-    }
     addPolygons(mesh, target);
     return true;
 }

@@ -24,9 +24,8 @@ public:
         }
     }
     ~NewFolders() {
-        for (const std::filesystem::path& folder : mFolders) {
+        for (const std::filesystem::path& folder : mFolders)
             ::rmdir(folder.c_str());
-        }
     }
     NewFolders(const NewFolders&) = delete;
     NewFolders& operator=(const NewFolders&) = delete;

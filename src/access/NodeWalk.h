@@ -23,9 +23,8 @@ bool walkNodes(fbxsdk::FbxNode* top, Visit&& visit) {
     };
     std::vector<Position> path;
     const auto enter = [&](fbxsdk::FbxNode* node) {
-        if (node == nullptr) {
+        if (node == nullptr)
             return true;
-        }
         path.push_back({node, 0});
         return static_cast<bool>(visit(*node));
     };
@@ -33,11 +32,10 @@ bool walkNodes(fbxsdk::FbxNode* top, Visit&& visit) {
     bool goOn = enter(top);
     while (goOn && !path.empty()) {
         Position& position = path.back();
-        if (position.nextChild < position.node->GetChildCount()) {
+        if (position.nextChild < position.node->GetChildCount())
             goOn = enter(position.node->GetChild(position.nextChild++));
-        } else {
+        else
             path.pop_back();
-        }
     }
     return goOn;
 }
@@ -46,9 +44,8 @@ bool walkNodes(fbxsdk::FbxNode* top, Visit&& visit) {
 template <class Visit>
 bool walkBelow(fbxsdk::FbxNode* top, Visit&& visit) {
     bool goOn = true;
-    for (int i = 0; goOn && top != nullptr && i < top->GetChildCount(); ++i) {
+    for (int i = 0; goOn && top != nullptr && i < top->GetChildCount(); ++i)
         goOn = walkNodes(top->GetChild(i), visit);
-    }
     return goOn;
 }
 

@@ -18,11 +18,10 @@ fbxsdk::FbxAxisSystem targetAxisSystem() {
 /// Only the bundled platform reports it.
 template <class Converter>
 int coarserSurfaces(const Converter& converter) {
-    if constexpr (requires { converter.coarserSurfaces(); }) {
+    if constexpr (requires { converter.coarserSurfaces(); })
         return converter.coarserSurfaces();
-    } else {
+    else
         return 0;
-    }
 }
 
 } // namespace
@@ -37,16 +36,14 @@ void detail::convertToCentimetres(fbxsdk::FbxScene& scene) {
 
 void detail::convertToYUp(fbxsdk::FbxScene& scene) {
     const fbxsdk::FbxAxisSystem target = targetAxisSystem();
-    if (scene.GetGlobalSettings().GetAxisSystem() != target) {
+    if (scene.GetGlobalSettings().GetAxisSystem() != target)
         target.ConvertScene(&scene);
-    }
 }
 
 bool detail::Triangulation::visit(fbxsdk::FbxNode& node) {
     fbxsdk::FbxNodeAttribute* attribute = node.GetNodeAttribute();
-    if (attribute == nullptr) {
+    if (attribute == nullptr)
         return true;
-    }
     const auto type = attribute->GetAttributeType();
     return (type != fbxsdk::FbxNodeAttribute::eNurbs && type != fbxsdk::FbxNodeAttribute::ePatch) ||
            mConverter.Triangulate(attribute, /*pReplace*/ true, /*pLegacy*/ false) != nullptr;

@@ -11,11 +11,10 @@ namespace Tarnell::Fbx {
 void detail::ObjectWarnings::add(const std::string& object, const std::string& fault) {
     const auto known =
         std::find_if(mRows.begin(), mRows.end(), [&fault](const Row& row) { return row.fault == fault; });
-    if (known == mRows.end()) {
+    if (known == mRows.end())
         mRows.push_back({fault, object, 0});
-    } else {
+    else
         ++known->others;
-    }
 }
 
 void detail::ObjectWarnings::report() const {

@@ -47,11 +47,9 @@ std::size_t characterLength(std::string_view text) {
                                : first < 0xF0 ? 3
                                : first < 0xF5 ? 4
                                               : 0;
-    for (std::size_t i = 1; i < length; ++i) {
-        if ((byte(i) & 0xC0U) != 0x80) {
+    for (std::size_t i = 1; i < length; ++i)
+        if ((byte(i) & 0xC0U) != 0x80)
             return 0;
-        }
-    }
     const bool needless = (first == 0xE0 && second < 0xA0) || (first == 0xF0 && second < 0x90);
     const bool none = (first == 0xED && second >= 0xA0) || (first == 0xF4 && second >= 0x90);
     return needless || none ? 0 : length;
@@ -88,13 +86,11 @@ std::string escaped(std::string_view name) {
 /// FNV-1a: the same in every build, unlike that of the standard library.
 std::string hashOf(std::string_view name) {
     std::uint64_t hash = 0xCBF29CE484222325U;
-    for (const char letter : name) {
+    for (const char letter : name)
         hash = (hash ^ static_cast<unsigned char>(letter)) * 0x100000001B3U;
-    }
     std::string digits;
-    for (int shift = 60; shift >= 0; shift -= 4) {
+    for (int shift = 60; shift >= 0; shift -= 4)
         digits += kHexDigits[hash >> static_cast<unsigned>(shift) & 0xFU];
-    }
     return digits;
 }
 
@@ -104,9 +100,8 @@ std::string beginning(const std::string& text, std::size_t mostBytes) {
     while (end < mostBytes) {
         const std::string_view rest = std::string_view(text).substr(end);
         const std::size_t length = looksEscaped(rest) ? 3 : characterLength(rest);
-        if (end + length > mostBytes) {
+        if (end + length > mostBytes)
             break;
-        }
         end += length;
     }
     return text.substr(0, end);
@@ -115,9 +110,8 @@ std::string beginning(const std::string& text, std::size_t mostBytes) {
 } // namespace
 
 std::string detail::pointCacheName(const std::string& nodeName) {
-    if (nodeName.empty()) {
+    if (nodeName.empty())
         return "%00"; // no other name begins with the byte that ends names
-    }
     std::string name = escaped(nodeName);
     if (isReserved(name)) {
         name = name.substr(1);

@@ -50,15 +50,13 @@ Cache* detail::pointCacheOf(fbxsdk::FbxNode& node) {
 
 bool detail::attachPointCache(fbxsdk::FbxManager& manager, fbxsdk::FbxGeometry& geometry, const PointCachePlace& place,
                               const char* name, bool maya, bool withScene) {
-    if (!fbxsdk::FbxPathUtils::Create(place.folder)) {
+    if (!fbxsdk::FbxPathUtils::Create(place.folder))
         return fail(std::string(place.folder) + ": the folder cannot be created");
-    }
     Cache* cache = Cache::Create(&manager, name);
     cache->SetCacheFileName(place.relative, place.file);
     cache->SetCacheFileFormat(maya ? Cache::eMayaCache : Cache::eMaxPointCacheV2);
-    if (withScene) {
+    if (withScene)
         appearWithScene(*cache);
-    }
     auto* deformer = fbxsdk::FbxVertexCacheDeformer::Create(&manager, name);
     deformer->SetCache(cache);
     deformer->Channel.Set(name);
@@ -70,12 +68,10 @@ bool detail::attachPointCache(fbxsdk::FbxManager& manager, fbxsdk::FbxGeometry& 
 const char* detail::pointCacheFault(const TnFbxMesh& mesh, const TnFbxTime& range) {
     const std::int64_t points = mesh.getNumberOfControlPoints();
     const std::int64_t frames = frameCount(range.getStartFrame(), range.getEndFrame());
-    if (points < 1) {
+    if (points < 1)
         return "the mesh has no control points";
-    }
-    if (frames < 1 || frames != mesh.getNumberOfControlPointSets()) {
+    if (frames < 1 || frames != mesh.getNumberOfControlPointSets())
         return "the mesh does not have one set of control points per frame";
-    }
     return frames > std::numeric_limits<int>::max() / points ? "the mesh has too many control points for a point cache"
                                                              : nullptr;
 }

@@ -29,20 +29,16 @@ inline constexpr OrderRow kRotationOrders[] = {
 inline constexpr OrderRow kFallbackOrder = {fbxsdk::FbxEuler::eOrderZXY, TnFbxTransform::kFbxRotationOrderZXY};
 
 inline TnFbxTransform::EFbxTransformRotationOrder rotationOrderOf(fbxsdk::FbxEuler::EOrder order) {
-    for (const OrderRow& row : kRotationOrders) {
-        if (row.fbx == order) {
+    for (const OrderRow& row : kRotationOrders)
+        if (row.fbx == order)
             return row.library;
-        }
-    }
     return kFallbackOrder.library;
 }
 
 inline fbxsdk::FbxEuler::EOrder rotationOrderOf(TnFbxTransform::EFbxTransformRotationOrder order) {
-    for (const OrderRow& row : kRotationOrders) {
-        if (row.library == order) {
+    for (const OrderRow& row : kRotationOrders)
+        if (row.library == order)
             return row.fbx;
-        }
-    }
     return kFallbackOrder.fbx;
 }
 

@@ -43,9 +43,8 @@ public:
     /// As many values.
     void add(const float* values, std::size_t count) {
         std::size_t done = 0;
-        while (done < count && mValues.empty()) {
+        while (done < count && mValues.empty())
             add(values[done++]);
-        }
         mValues.insert(mValues.end(), values + done, values + count);
         mCount += count - done;
     }
@@ -66,16 +65,14 @@ public:
     template <class Function>
     void transform(Function&& function) {
         mFirst = function(mFirst);
-        for (float& value : mValues) {
+        for (float& value : mValues)
             value = function(value);
-        }
     }
 
     /// Stores them in a channel, which takes them over unless some are missing or the range is empty.
     bool moveInto(TnFbxChannel& channel, const TnFbxTime& time) {
-        if (!isComplete()) {
+        if (!isComplete())
             return false;
-        }
         return mValues.empty() ? channel.setConstantValues(time, mFirst)
                                : channel.moveAnimatedValues(time, std::move(mValues));
     }

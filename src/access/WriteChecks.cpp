@@ -23,14 +23,11 @@ bool isRate(float framesPerSecond) { return std::isfinite(framesPerSecond) && fr
 
 bool hasFiniteSamples(const TnFbxChannel& channel) {
     const TnFbxTime range = channel.getTime();
-    if (channel.isConstant()) {
+    if (channel.isConstant())
         return std::isfinite(channel.getAnimatedValue(static_cast<float>(range.getStartFrame())));
-    }
-    for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame) {
-        if (!std::isfinite(channel.getAnimatedValue(static_cast<float>(frame)))) {
+    for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame)
+        if (!std::isfinite(channel.getAnimatedValue(static_cast<float>(frame))))
             return false;
-        }
-    }
     return true;
 }
 
@@ -38,9 +35,8 @@ bool hasFiniteSamples(const TnFbxChannel& channel) {
 class ChannelCheck {
 public:
     void visit(const TnFbxChannel* channel) {
-        if (channel == nullptr) {
+        if (channel == nullptr)
             return;
-        }
         mFinite = mFinite && std::isfinite(channel->getValue());
         if (channel->getAnimated()) {
             mRate = mRate && isRate(channel->getTime().getFrameRate());
@@ -48,12 +44,10 @@ public:
         }
     }
     void report(const std::string& object, ObjectWarnings& warnings) const {
-        if (!mFinite) {
+        if (!mFinite)
             warnings.add(object, kNoNumbers);
-        }
-        if (!mRate) {
+        if (!mRate)
             warnings.add(object, kNoRate);
-        }
     }
 
 private:
@@ -61,9 +55,8 @@ private:
 };
 
 void visitPlacement(ChannelCheck& check, TnFbxTransform& transform) {
-    for (int i = TnFbxTransform::kFbxTransformPositionX; i <= TnFbxTransform::kFbxTransformScaleZ; ++i) {
+    for (int i = TnFbxTransform::kFbxTransformPositionX; i <= TnFbxTransform::kFbxTransformScaleZ; ++i)
         check.visit(transform.getTransformChannel(static_cast<TnFbxTransform::EFbxTransformChannelType>(i)));
-    }
 }
 
 void visitLens(ChannelCheck& check, TnFbxCamera& camera) {
@@ -90,9 +83,8 @@ bool areFinite(int count, const Get& get) {
     for (int i = 0; i < count; ++i) {
         float x = 0.0f, y = 0.0f, z = 0.0f;
         get(i, x, y, z);
-        if (!std::isfinite(x) || !std::isfinite(y) || !std::isfinite(z)) {
+        if (!std::isfinite(x) || !std::isfinite(y) || !std::isfinite(z))
             return false;
-        }
     }
     return true;
 }
@@ -120,9 +112,8 @@ void checkPolygons(const TnFbxMesh& mesh, ObjectWarnings& warnings) {
         anyEmpty = anyEmpty || size < 1;
         corners += size > 0 ? size : 0;
     }
-    if (anyEmpty) {
+    if (anyEmpty)
         warnings.add(mesh.getName(), "polygons without polygon vertices are left out");
-    }
     if (corners > mesh.getNumberOfPolygonVertices()) {
         warnings.add(
             mesh.getName(),
@@ -134,9 +125,8 @@ bool namesItsPointsOnly(const TnFbxMesh& mesh) {
     const int points = mesh.getNumberOfControlPoints();
     for (int corner = 0; corner < mesh.getNumberOfPolygonVertices(); ++corner) {
         const int point = mesh.getPointIndex(corner);
-        if (point < 0 || point >= points) {
+        if (point < 0 || point >= points)
             return false;
-        }
     }
     return true;
 }
@@ -166,9 +156,8 @@ void detail::check(TnFbxCamera& camera, ObjectWarnings& warnings) {
     visitPlacement(check, camera);
     for (const auto channel :
          {TnFbxCamera::kFbxCameraApertureWidth, TnFbxCamera::kFbxCameraApertureHeight, TnFbxCamera::kFbxCameraNearPlane,
-          TnFbxCamera::kFbxCameraFarPlane, TnFbxCamera::kFbxCameraFilmOffsetX, TnFbxCamera::kFbxCameraFilmOffsetY}) {
+          TnFbxCamera::kFbxCameraFarPlane, TnFbxCamera::kFbxCameraFilmOffsetX, TnFbxCamera::kFbxCameraFilmOffsetY})
         check.visit(camera.getCameraChannel(channel));
-    }
     visitLens(check, camera);
     check.report(camera.getName(), warnings);
 }
@@ -177,23 +166,19 @@ void detail::check(TnFbxLight& light, ObjectWarnings& warnings) {
     ChannelCheck check;
     visitPlacement(check, light);
     for (const auto channel : {TnFbxLight::kFbxLightRed, TnFbxLight::kFbxLightGreen, TnFbxLight::kFbxLightBlue,
-                               TnFbxLight::kFbxLightIntensity}) {
+                               TnFbxLight::kFbxLightIntensity})
         check.visit(light.getLightChannel(channel));
-    }
-    if (light.getLightType() == TnFbxLight::kFbxLightSpot) {
+    if (light.getLightType() == TnFbxLight::kFbxLightSpot)
         check.visit(light.getLightChannel(TnFbxLight::kFbxLightConeAngle));
-    }
     check.report(light.getName(), warnings);
 }
 
 void detail::check(const TnFbxMesh& mesh, ObjectWarnings& warnings) {
     checkPolygons(mesh, warnings);
-    if (!namesItsPointsOnly(mesh)) {
+    if (!namesItsPointsOnly(mesh))
         warnings.add(mesh.getName(), "polygons refer to control points that do not exist");
-    }
-    if (!hasFiniteNumbers(mesh)) {
+    if (!hasFiniteNumbers(mesh))
         warnings.add(mesh.getName(), kNoNumbers);
-    }
 }
 
 } // namespace Tarnell::Fbx

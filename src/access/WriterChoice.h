@@ -21,9 +21,8 @@ int findWriter(const Registry& registry, const char* word) {
     const int count = registry.GetWriterFormatCount();
     for (int format = 0; format < count; ++format) {
         const bool isFbx = registry.WriterIsFBX(format);
-        if (isFbx && fbxsdk::FbxString(registry.GetWriterFormatDescription(format)).Find(word) >= 0) {
+        if (isFbx && fbxsdk::FbxString(registry.GetWriterFormatDescription(format)).Find(word) >= 0)
             return format;
-        }
     }
     return registry.GetNativeWriterFormat();
 }
@@ -40,9 +39,8 @@ inline const char* versionString(TnFbxWriteInfo::eCompatibilityVersion version) 
 /// releases the exporter then.
 inline bool exportDocument(fbxsdk::FbxExporter& exporter, fbxsdk::FbxDocument* document, const std::string& fileName,
                            int format) {
-    if (!exporter.Initialize(fileName.c_str(), format, /*pIOSettings*/ nullptr)) {
+    if (!exporter.Initialize(fileName.c_str(), format, /*pIOSettings*/ nullptr))
         return failAbout(fileName, exporter.GetStatus().GetErrorString(), "cannot be written");
-    }
     const bool exported = exporter.Export(document, /*pNonBlocking*/ false);
     const bool result =
         exported ? succeed() : failAbout(fileName, exporter.GetStatus().GetErrorString(), "cannot be written");

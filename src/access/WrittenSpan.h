@@ -15,9 +15,8 @@ namespace Tarnell::Fbx::detail {
 inline void enforceRotationOrder(fbxsdk::FbxNode& node) {
     fbxsdk::FbxEuler::EOrder order = fbxsdk::FbxEuler::eOrderXYZ;
     node.GetRotationOrder(fbxsdk::FbxNode::eSourcePivot, order);
-    if (order != fbxsdk::FbxEuler::eOrderXYZ) {
+    if (order != fbxsdk::FbxEuler::eOrderXYZ)
         node.SetRotationActive(true);
-    }
 }
 
 /// The span of time that a file states: that of its keys and of the range to write.

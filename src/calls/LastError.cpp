@@ -49,15 +49,13 @@ bool detail::succeed() {
 void detail::warn(const std::string& text) {
     std::string sentence = printable(text);
     std::vector<std::string>& warnings = outcome().warnings;
-    if (std::find(warnings.begin(), warnings.end(), sentence) == warnings.end()) {
+    if (std::find(warnings.begin(), warnings.end(), sentence) == warnings.end())
         warnings.push_back(std::move(sentence));
-    }
 }
 
 detail::CallScope::CallScope() {
-    if (outcome().callDepth++ == 0) {
+    if (outcome().callDepth++ == 0)
         outcome().warnings.clear();
-    }
 }
 
 detail::CallScope::~CallScope() { --outcome().callDepth; }

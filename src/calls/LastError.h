@@ -27,9 +27,8 @@ bool failOnFault(const std::string& fileName, const Work& work) {
     try {
         return work();
     } catch (const std::runtime_error& fault) {
-        if (std::string_view(fault.what()) == "FbxLayerElementArrayTemplate - mDirectArray is NULL") {
+        if (std::string_view(fault.what()) == "FbxLayerElementArrayTemplate - mDirectArray is NULL")
             throw;
-        }
         return failAbout(fileName, fault.what(), "cannot be read");
     }
 }

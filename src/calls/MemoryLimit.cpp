@@ -21,9 +21,8 @@ std::atomic<std::uint64_t> chosenLimit{0}; // 0: the default
 std::uint64_t halfOfTheMemory() {
     const long pages = sysconf(_SC_PHYS_PAGES);
     const long pageSize = sysconf(_SC_PAGESIZE);
-    if (pages <= 0 || pageSize <= 0) {
+    if (pages <= 0 || pageSize <= 0)
         return std::numeric_limits<std::uint64_t>::max();
-    }
     return static_cast<std::uint64_t>(pages) / 2 * static_cast<std::uint64_t>(pageSize);
 }
 
@@ -52,9 +51,8 @@ std::string detail::MemoryAccount::describe(const char* what) const {
 }
 
 std::string detail::describeBytes(std::uint64_t bytes) {
-    if (bytes < 1024) {
+    if (bytes < 1024)
         return std::to_string(bytes) + " bytes";
-    }
     constexpr std::array<const char*, 6> units = {"KiB", "MiB", "GiB", "TiB", "PiB", "EiB"};
     double amount = static_cast<double>(bytes) / 1024.0;
     std::size_t unit = 0;

@@ -18,19 +18,16 @@ struct Character {
 Character frontOf(std::string_view text) {
     const auto byte = [text](std::size_t index) { return static_cast<unsigned char>(text[index]); };
     const unsigned first = byte(0);
-    if (first < 0x80) {
+    if (first < 0x80)
         return {first, 1};
-    }
     const std::size_t size = first >= 0xF0 ? 4 : first >= 0xE0 ? 3 : 2;
     constexpr std::array<char32_t, 5> kLeast = {0, 0, 0x80, 0x800, 0x10000};
-    if (first < 0xC0 || first > 0xF4 || text.size() < size) {
+    if (first < 0xC0 || first > 0xF4 || text.size() < size)
         return {};
-    }
     char32_t code = first & (0xFFU >> (size + 1));
     for (std::size_t i = 1; i < size; ++i) {
-        if ((byte(i) & 0xC0U) != 0x80U) {
+        if ((byte(i) & 0xC0U) != 0x80U)
             return {};
-        }
         code = code << 6U | (byte(i) & 0x3FU);
     }
     const bool isSurrogate = code >= 0xD800 && code <= 0xDFFF;
@@ -44,9 +41,8 @@ bool isObeyed(char32_t code) {
 }
 
 void appendHexadecimal(std::string& text, unsigned number, int digits) {
-    while (digits-- > 0) {
+    while (digits-- > 0)
         text += "0123456789ABCDEF"[number >> (4 * digits) & 0xFU];
-    }
 }
 
 } // namespace

@@ -23,9 +23,8 @@ double lengthOf(const FbxVector4& a) { return std::sqrt(a[0] * a[0] + a[1] * a[1
 /// Of unit length; nothing where there is none.
 std::optional<FbxVector4> direction(const FbxVector4& a) {
     const double length = lengthOf(a);
-    if (!(length > 1e-12) || !std::isfinite(length)) {
+    if (!(length > 1e-12) || !std::isfinite(length))
         return std::nullopt;
-    }
     return FbxVector4(a[0] / length, a[1] / length, a[2] / length);
 }
 
@@ -39,30 +38,24 @@ FbxAMatrix turnOf(const FbxVector4& angles) {
 
 FbxAMatrix aimed(const FbxAMatrix& camera, const FbxVector4& point, const FbxVector4& up, double roll) {
     const std::optional<FbxVector4> back = direction(minus(camera.GetT(), point));
-    if (!back) {
+    if (!back)
         return camera;
-    }
     std::optional<FbxVector4> right = direction(crossProduct(up, *back));
-    if (!right) {
+    if (!right)
         right = direction(crossProduct(camera.GetRow(1), *back));
-    }
-    if (!right) {
+    if (!right)
         return camera;
-    }
     const FbxVector4 axes[3] = {*right, crossProduct(*back, *right), *back};
     FbxAMatrix turned;
-    for (int axis = 0; axis < 3; ++axis) {
-        for (int component = 0; component < 3; ++component) {
+    for (int axis = 0; axis < 3; ++axis)
+        for (int component = 0; component < 3; ++component)
             turned[axis][component] = axes[axis][component];
-        }
-    }
     turned = turned * turnOf(FbxVector4(0.0, 0.0, -roll));
     FbxAMatrix matrix = camera;
     for (int axis = 0; axis < 3; ++axis) {
         const double size = lengthOf(camera.GetRow(axis));
-        for (int component = 0; component < 3; ++component) {
+        for (int component = 0; component < 3; ++component)
             matrix[axis][component] = turned[axis][component] * size;
-        }
     }
     return matrix;
 }

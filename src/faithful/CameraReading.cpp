@@ -64,21 +64,18 @@ public:
     bool hasTarget() const { return mNode.GetTarget() != nullptr; }
 
     FbxVector4 pointAt(const FbxTime& time) const {
-        if (FbxNode* target = mNode.GetTarget()) {
+        if (FbxNode* target = mNode.GetTarget())
             return worldMatrix(*target, time).GetT();
-        }
         FbxVector4 point = asVector(mCamera.InterestPosition.EvaluateValue(time));
-        for (int i = 0; i < 3; ++i) {
+        for (int i = 0; i < 3; ++i)
             point[i] *= mUnit; // nodes were scaled to centimetres, the attribute's point was not
-        }
         return point;
     }
 
     /// Toward the parent where there is one.
     FbxVector4 upAt(const FbxTime& time) const {
-        if (FbxNode* above = mNode.GetTargetUp()) {
+        if (FbxNode* above = mNode.GetTargetUp())
             return minus(worldMatrix(*above, time).GetT(), worldMatrix(mNode, time).GetT());
-        }
         return asVector(mCamera.UpVector.EvaluateValue(time));
     }
 

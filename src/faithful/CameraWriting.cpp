@@ -94,9 +94,8 @@ public:
           mInches(inchesPerUnit(camera)) {
         std::vector<const TnFbxChannel*> channels = {&channelOf(camera, TnFbxCamera::kFbxCameraApertureWidth),
                                                      &channelOf(camera, TnFbxCamera::kFbxCameraApertureHeight)};
-        for (const Channel driver : mDrivers) {
+        for (const Channel driver : mDrivers)
             channels.push_back(&channelOf(camera, driver));
-        }
         mRange = keys.rangeOf(channels);
     }
 
@@ -119,17 +118,14 @@ private:
     template <class ValueOf>
     Lens agreeingWith(const ValueOf& valueOf) const {
         Lens stated{};
-        for (const LensRow& row : kLensRows) {
+        for (const LensRow& row : kLensRows)
             stated.*row.value = valueOf(channelOf(mCamera, row.channel));
-        }
         stated.width *= mInches;
         stated.height *= mInches;
         Lens lens = agreeing(stated, mMode);
-        for (const LensRow& row : kLensRows) { // unchanged, not computed from themselves
-            if (std::find(mDrivers.begin(), mDrivers.end(), row.channel) != mDrivers.end()) {
+        for (const LensRow& row : kLensRows) // unchanged, not computed from themselves
+            if (std::find(mDrivers.begin(), mDrivers.end(), row.channel) != mDrivers.end())
                 lens.*row.value = stated.*row.value;
-            }
-        }
         return lens;
     }
 
@@ -146,14 +142,14 @@ void writeLens(KeyWriter& keys, TnFbxCamera& source, FbxCamera& camera) {
     const Lens still = lens.still();
     camera.ApertureMode.Set(apertureModeOf(source.getApertureMode()));
     camera.FilmSqueezeRatio.Set(1.0);
-    if (still.height > 0.0) {
+    if (still.height > 0.0)
         camera.FilmAspectRatio.Set(still.width / still.height);
-    }
     for (const LensRow& row : kLensRows) {
         (camera.*row.property).Set(still.*row.value);
         if (lens.isKeyed(row.channel)) {
-            keys.writeKeys(camera.*row.property, nullptr, lens.range(),
-                           [&](std::int64_t frame) { return lens.at(frame).*row.value; });
+            keys.writeKeys(
+                camera.*row.property, nullptr, lens.range(),
+                [&](std::int64_t frame) { return lens.at(frame).*row.value; });
         }
     }
 }
@@ -165,12 +161,10 @@ class LookAt {
 public:
     LookAt(KeyWriter& keys, TnFbxCamera& camera) : mKeys(keys), mCamera(camera) {
         std::vector<const TnFbxChannel*> channels;
-        for (int i = TnFbxCamera::kFbxCameraLookAtPositionX; i <= TnFbxCamera::kFbxCameraRoll; ++i) {
+        for (int i = TnFbxCamera::kFbxCameraLookAtPositionX; i <= TnFbxCamera::kFbxCameraRoll; ++i)
             channels.push_back(&channelOf(camera, i));
-        }
-        for (int i = TnFbxTransform::kFbxTransformPositionX; i <= TnFbxTransform::kFbxTransformRotationZ; ++i) {
+        for (int i = TnFbxTransform::kFbxTransformPositionX; i <= TnFbxTransform::kFbxTransformRotationZ; ++i)
             channels.push_back(camera.getTransformChannel(static_cast<TnFbxTransform::EFbxTransformChannelType>(i)));
-        }
         mRange = keys.rangeOf(channels);
     }
 
@@ -201,18 +195,15 @@ public:
     /// The rotation is that of a camera with a target, including the roll.
     bool isRolledAim() const {
         const TnFbxChannel& roll = channelOf(mCamera, TnFbxCamera::kFbxCameraRoll);
-        if (!changes(roll) && staticValue(roll) == 0.0) {
+        if (!changes(roll) && staticValue(roll) == 0.0)
             return false;
-        }
         for (std::int64_t frame = mRange.first; frame <= mRange.last; ++frame) {
             constexpr double kSameDirection = 1e-4; // of computed floats
             const FbxAMatrix own = placeAt(frame), aim = aimedAt(frame);
             for (int axis = 0; axis < 3; ++axis) {
-                for (int component = 0; component < 3; ++component) {
-                    if (!(std::abs(own.Get(axis, component) - aim.Get(axis, component)) < kSameDirection)) {
+                for (int component = 0; component < 3; ++component)
+                    if (!(std::abs(own.Get(axis, component) - aim.Get(axis, component)) < kSameDirection))
                         return false;
-                    }
-                }
             }
         }
         return true;
@@ -229,9 +220,9 @@ public:
         node.LclRotation.Set(fbxsdk::FbxDouble3(angles[0][0], angles[0][1], angles[0][2]));
         constexpr const char* kComponents[] = {"X", "Y", "Z"};
         for (std::size_t i = 0; i < 3; ++i) {
-            keys.writeKeys(node.LclRotation, kComponents[i], mRange, [&](std::int64_t frame) {
-                return angles[static_cast<std::size_t>(frame - mRange.first)][i];
-            });
+            keys.writeKeys(
+                node.LclRotation, kComponents[i], mRange,
+                [&](std::int64_t frame) { return angles[static_cast<std::size_t>(frame - mRange.first)][i]; });
         }
     }
 
@@ -271,9 +262,8 @@ void writeLookAt(WrittenScene& scene, TnFbxCamera& source, fbxsdk::FbxNode& node
 
     const LookAt lookAt(keys, source);
     const bool turns = scene.info().getComputeCameraRotation() && lookAt.wantsAim();
-    if (!turns && !lookAt.isRolledAim()) { // the rotation determines the direction
+    if (!turns && !lookAt.isRolledAim()) // the rotation determines the direction
         return;
-    }
     fbxsdk::FbxNode& target = scene.addNode(source.getName() + " target");
     scene.add<fbxsdk::FbxNull>(target);
     keys.write(target.LclTranslation, channelsFrom(source, TnFbxCamera::kFbxCameraLookAtPositionX));

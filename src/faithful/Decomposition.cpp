@@ -58,9 +58,8 @@ void completeAxes(std::array<Vector, 3>& axes, std::array<bool, 3> known) {
             return;
         }
     }
-    if (!known[0]) {
+    if (!known[0])
         axes = {Vector{1.0, 0.0, 0.0}, Vector{0.0, 1.0, 0.0}, Vector{0.0, 0.0, 1.0}};
-    }
 }
 
 /// The axes of an order, in turn, and +1 where they are in the cyclic order of X, Y and Z.
@@ -115,9 +114,8 @@ double handedness(const Matrix& matrix) {
 Parts decompose(const Matrix& matrix, const Vector& signs) {
     Vector sign = {signs[0] < 0.0 ? -1.0 : 1.0, signs[1] < 0.0 ? -1.0 : 1.0, signs[2] < 0.0 ? -1.0 : 1.0};
     const double hand = handedness(matrix);
-    if (hand * sign[0] * sign[1] * sign[2] < 0.0) {
+    if (hand * sign[0] * sign[1] * sign[2] < 0.0)
         sign[0] = -sign[0];
-    }
     Parts parts;
     parts.position = axisOf(matrix, 3);
     const std::array<Vector, 3> axes = {axisOf(matrix, 0), axisOf(matrix, 1), axisOf(matrix, 2)};
@@ -141,11 +139,9 @@ Parts decompose(const Matrix& matrix, const Vector& signs) {
     };
     parts.skew = {skew(1, 0), skew(2, 0), skew(2, 1)};
     completeAxes(unit, known);
-    for (int axis = 0; axis < 3; ++axis) {
-        for (int component = 0; component < 3; ++component) {
+    for (int axis = 0; axis < 3; ++axis)
+        for (int component = 0; component < 3; ++component)
             parts.rotation[axis][component] = unit[static_cast<std::size_t>(axis)][static_cast<std::size_t>(component)];
-        }
-    }
     return parts;
 }
 
@@ -185,11 +181,9 @@ Vector anglesNear(const Matrix& rotation, RotationOrder order, const Vector& nea
 
 bool turnAlike(const Matrix& a, const Matrix& b) {
     for (int axis = 0; axis < 3; ++axis) {
-        for (int component = 0; component < 3; ++component) {
-            if (!(std::fabs(a.Get(axis, component) - b.Get(axis, component)) < kSameRotation)) {
+        for (int component = 0; component < 3; ++component)
+            if (!(std::fabs(a.Get(axis, component) - b.Get(axis, component)) < kSameRotation))
                 return false;
-            }
-        }
     }
     return true;
 }
@@ -200,9 +194,8 @@ fbxsdk::FbxVector4 transformedNormal(const Matrix& matrix, const fbxsdk::FbxVect
     const Vector z = axisOf(matrix, 2);
     Vector sum = plus(plus(scaled(cross(y, z), normal[0]), cross(z, x), normal[1]), cross(x, y), normal[2]);
     const double size = length(sum);
-    if (!(size > 0.0)) {
+    if (!(size > 0.0))
         return {0.0, 0.0, 0.0, normal[3]};
-    }
     sum = scaled(sum, (handedness(matrix) < 0.0 ? -1.0 : 1.0) / size);
     return {sum[0], sum[1], sum[2], normal[3]};
 }

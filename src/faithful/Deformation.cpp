@@ -28,9 +28,8 @@ class OpenCache {
 public:
     explicit OpenCache(fbxsdk::FbxCache& cache) : mCache(cache), mOpen(cache.OpenFileForRead()) {}
     ~OpenCache() {
-        if (mOpen) {
+        if (mOpen)
             mCache.CloseFile();
-        }
     }
     OpenCache(const OpenCache&) = delete;
     OpenCache& operator=(const OpenCache&) = delete;
@@ -59,9 +58,8 @@ fbxsdk::FbxVertexCacheDeformer* activeCacheOf(const fbxsdk::FbxMesh& mesh, int t
     for (int i = 0; i < mesh.GetDeformerCount(Deformer::eVertexCache); ++i) {
         auto* deformer = fbxsdk::FbxCast<fbxsdk::FbxVertexCacheDeformer>(mesh.GetDeformer(i, Deformer::eVertexCache));
         if (deformer != nullptr && deformer->Active.Get() && deformer->GetCache() != nullptr &&
-            typeOf(*deformer) == type) {
+            typeOf(*deformer) == type)
             return deformer;
-        }
     }
     return nullptr;
 }
@@ -79,19 +77,15 @@ bool readMaxCache(fbxsdk::FbxCache& cache, double frame, std::vector<double>& bu
     const double whole = std::floor(held + 1e-4);
     const double rest = std::fmax(held - whole, 0.0);
     const auto points = static_cast<unsigned int>(buffer.size() / 3);
-    if (!cache.Read(static_cast<unsigned int>(whole), buffer.data(), points)) {
+    if (!cache.Read(static_cast<unsigned int>(whole), buffer.data(), points))
         return false;
-    }
-    if (rest < 1e-4) {
+    if (rest < 1e-4)
         return true;
-    }
     std::vector<double> next(buffer.size());
-    if (!cache.Read(static_cast<unsigned int>(whole) + 1, next.data(), points)) {
+    if (!cache.Read(static_cast<unsigned int>(whole) + 1, next.data(), points))
         return false;
-    }
-    for (std::size_t i = 0; i < buffer.size(); ++i) {
+    for (std::size_t i = 0; i < buffer.size(); ++i)
         buffer[i] += (next[i] - buffer[i]) * rest;
-    }
     return true;
 }
 
@@ -125,12 +119,10 @@ std::vector<Knot> knotsOf(fbxsdk::FbxBlendShapeChannel& channel) {
 std::array<TargetShare, 2> sharesAt(fbxsdk::FbxBlendShapeChannel& channel, double weight) {
     const std::vector<Knot> knots = knotsOf(channel);
     std::size_t upper = 1;
-    while (upper + 1 < knots.size() && weight > knots[upper].first) {
+    while (upper + 1 < knots.size() && weight > knots[upper].first)
         ++upper;
-    }
-    if (upper >= knots.size()) {
+    if (upper >= knots.size())
         return {TargetShare{-1, 1.0}, TargetShare{-1, 0.0}};
-    }
     const auto [below, lowerTarget] = knots[upper - 1];
     const auto [above, upperTarget] = knots[upper];
     const double share = above > below ? (weight - below) / (above - below) : 1.0;
@@ -141,14 +133,11 @@ bool addTarget(const fbxsdk::FbxShape& shape, const std::vector<Point>& base, do
                std::vector<Point>& points) {
     const Point* target = shape.GetControlPoints();
     const auto count = static_cast<std::size_t>(std::max(shape.GetControlPointsCount(), 0));
-    if (target == nullptr || share == 0.0) {
+    if (target == nullptr || share == 0.0)
         return false;
-    }
-    for (std::size_t i = 0; i < std::min(count, points.size()); ++i) {
-        for (int axis = 0; axis < 3; ++axis) {
+    for (std::size_t i = 0; i < std::min(count, points.size()); ++i)
+        for (int axis = 0; axis < 3; ++axis)
             points[i][axis] += (target[i][axis] - base[i][axis]) * share;
-        }
-    }
     return true;
 }
 
@@ -157,9 +146,8 @@ bool addTarget(const fbxsdk::FbxShape& shape, const std::vector<Point>& base, do
 bool applyPointCache(Scene& scene, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh, const FbxTime& time,
                      std::vector<Point>& points) {
     fbxsdk::FbxVertexCacheDeformer* deformer = activeCacheOf(mesh, fbxsdk::FbxVertexCacheDeformer::ePositions);
-    if (deformer == nullptr) {
+    if (deformer == nullptr)
         return false;
-    }
     fbxsdk::FbxCache& cache = *deformer->GetCache();
     const OpenCache open(cache);
     std::vector<double> buffer(points.size() * 3);
@@ -171,44 +159,38 @@ bool applyPointCache(Scene& scene, fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh,
                      "\" cannot be read; the mesh is read without it");
         return false;
     }
-    for (std::size_t i = 0; i < points.size(); ++i) {
-        for (int axis = 0; axis < 3; ++axis) {
+    for (std::size_t i = 0; i < points.size(); ++i)
+        for (int axis = 0; axis < 3; ++axis)
             points[i][axis] = buffer[3 * i + static_cast<std::size_t>(axis)];
-        }
-    }
     return true;
 }
 
 std::vector<Point> cachedNormals(const fbxsdk::FbxMesh& mesh, const FbxTime& time) {
     fbxsdk::FbxVertexCacheDeformer* deformer = activeCacheOf(mesh, fbxsdk::FbxVertexCacheDeformer::eNormals);
-    if (deformer == nullptr || deformer->GetCache()->GetCacheFileFormat() != fbxsdk::FbxCache::eMayaCache) {
+    if (deformer == nullptr || deformer->GetCache()->GetCacheFileFormat() != fbxsdk::FbxCache::eMayaCache)
         return {};
-    }
     const OpenCache open(*deformer->GetCache());
     std::vector<double> buffer(static_cast<std::size_t>(std::max(mesh.GetPolygonVertexCount(), 0)) * 3);
     std::vector<Point> normals;
     if (open.isOpen() && readMayaCache(*deformer->GetCache(), deformer->Channel.Get(), time, buffer)) {
         normals.reserve(buffer.size() / 3);
-        for (std::size_t i = 0; i + 2 < buffer.size(); i += 3) {
+        for (std::size_t i = 0; i + 2 < buffer.size(); i += 3)
             normals.emplace_back(buffer[i], buffer[i + 1], buffer[i + 2]);
-        }
     }
     return normals;
 }
 
 bool applyBlendShapes(fbxsdk::FbxMesh& mesh, const FbxTime& time, std::vector<Point>& points) {
-    if (mesh.GetShapeCount() == 0) {
+    if (mesh.GetShapeCount() == 0)
         return false;
-    }
     const std::vector<Point> base = points;
     bool moved = false;
     for (int i = 0; i < mesh.GetDeformerCount(Deformer::eBlendShape); ++i) {
         auto* blendShape = fbxsdk::FbxCast<fbxsdk::FbxBlendShape>(mesh.GetDeformer(i, Deformer::eBlendShape));
         for (int c = 0; blendShape != nullptr && c < blendShape->GetBlendShapeChannelCount(); ++c) {
             fbxsdk::FbxBlendShapeChannel* channel = blendShape->GetBlendShapeChannel(c);
-            if (channel == nullptr) {
+            if (channel == nullptr)
                 continue;
-            }
             for (const TargetShare& part : sharesAt(*channel, channel->DeformPercent.EvaluateValue(time))) {
                 const fbxsdk::FbxShape* shape = part.target >= 0 ? channel->GetTargetShape(part.target) : nullptr;
                 moved = (shape != nullptr && addTarget(*shape, base, part.share, points)) || moved;
@@ -222,9 +204,8 @@ DeformedMesh deformedPoints(Scene& scene, fbxsdk::FbxNode& node, fbxsdk::FbxMesh
     DeformedMesh deformed;
     const auto count = static_cast<std::size_t>(std::max(mesh.GetControlPointsCount(), 0));
     deformed.points.reserve(count);
-    for (std::size_t i = 0; i < count; ++i) {
+    for (std::size_t i = 0; i < count; ++i)
         deformed.points.push_back(mesh.GetControlPointAt(static_cast<int>(i)));
-    }
     if (count > 0 && applyPointCache(scene, node, mesh, time, deformed.points)) {
         deformed.normals = cachedNormals(mesh, time);
         deformed.reshaped = deformed.normals.empty();

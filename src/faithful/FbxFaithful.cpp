@@ -39,18 +39,18 @@ bool FbxFaithful::load(const TnFbxReadInfo& info) {
 }
 
 bool FbxFaithful::select(const TnFbxReadInfo& info) {
-    return call(mFile->info, [&] {
-        if (!mFile->scene.isLoaded()) {
-            return detail::fail("no file is loaded");
-        }
-        if (!mFile->scene.select(info)) {
-            return false;
-        }
-        const std::string fileName = mFile->info.getFileName();
-        mFile->info = info;
-        mFile->info.setFileName(fileName);
-        return true;
-    });
+    return call(
+        mFile->info,
+        [&] {
+            if (!mFile->scene.isLoaded())
+                return detail::fail("no file is loaded");
+            if (!mFile->scene.select(info))
+                return false;
+            const std::string fileName = mFile->info.getFileName();
+            mFile->info = info;
+            mFile->info.setFileName(fileName);
+            return true;
+        });
 }
 
 fbxsdk::FbxScene* FbxFaithful::getScene() const { return mFile->scene.isLoaded() ? &mFile->scene.scene() : nullptr; }
@@ -62,13 +62,15 @@ long long FbxFaithful::getLastFrame() const { return mFile->scene.timeline().las
 bool FbxFaithful::setFrame(float frame) { return mFile->scene.setFrame(frame); }
 
 bool FbxFaithful::makeMeshes() {
-    return call(mFile->info, [&] {
-        if (!mFile->hasMeshes) {
-            faithful::triangulateSurfaces(mFile->scene);
-            mFile->hasMeshes = true;
-        }
-        return true;
-    });
+    return call(
+        mFile->info,
+        [&] {
+            if (!mFile->hasMeshes) {
+                faithful::triangulateSurfaces(mFile->scene);
+                mFile->hasMeshes = true;
+            }
+            return true;
+        });
 }
 
 template <class Object>
@@ -83,17 +85,20 @@ bool FbxFaithful::readAll(Object** objects, int& count) {
 
 template <class Object>
 bool FbxFaithful::read(fbxsdk::FbxNode& node, Object& object) {
-    return call(mFile->info, [&] {
-        object.setName(node.GetName());
-        const bool isRead = faithful::readNode(mFile->scene, mFile->info, node, object);
-        mFile->scene.warnings().report();
-        mFile->scene.warnings().forget();
-        return isRead;
-    });
+    return call(
+        mFile->info,
+        [&] {
+            object.setName(node.GetName());
+            const bool isRead = faithful::readNode(mFile->scene, mFile->info, node, object);
+            mFile->scene.warnings().report();
+            mFile->scene.warnings().forget();
+            return isRead;
+        });
 }
 
 bool FbxFaithful::readPoints(fbxsdk::FbxNode& node, TnFbxMesh& mesh) {
-    return call(mFile->info, [&] { return faithful::addPoints(mFile->scene, mFile->info, node, mesh); });
+    return call(
+        mFile->info, [&] { return faithful::addPoints(mFile->scene, mFile->info, node, mesh); });
 }
 
 #define TARNELL_FBX_FAITHFUL(Object)                                                                                   \

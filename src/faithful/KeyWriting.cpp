@@ -44,9 +44,8 @@ public:
 
     /// To be called at the end.
     void holdLast() {
-        if (mAny && mFrame != mKeyed) {
+        if (mAny && mFrame != mKeyed)
             set(mFrame, mValue);
-        }
     }
 
 private:
@@ -95,9 +94,8 @@ FrameRange KeyWriter::rangeOf(const std::vector<const TnFbxChannel*>& channels) 
     FrameRange common{0, 0, mRate};
     bool any = false;
     for (const TnFbxChannel* channel : channels) {
-        if (!changes(*channel)) {
+        if (!changes(*channel))
             continue;
-        }
         const FrameRange range = rangeOf(*channel);
         if (!any) {
             common = range;
@@ -113,9 +111,8 @@ FrameRange KeyWriter::rangeOf(const std::vector<const TnFbxChannel*>& channels) 
 }
 
 double KeyWriter::valueAt(const TnFbxChannel& channel, std::int64_t frame, const FrameRange& range) const {
-    if (!changes(channel)) {
+    if (!changes(channel))
         return staticValue(channel);
-    }
     const double ratio = rangeOf(channel).rate / range.rate;
     return static_cast<double>(channel.getAnimatedValue(static_cast<float>(static_cast<double>(frame) * ratio)));
 }
@@ -130,29 +127,24 @@ void KeyWriter::writeKeys(fbxsdk::FbxProperty property, const char* component, c
     const auto first = static_cast<float>(valueAt(range.first));
     std::int64_t next = range.first + 1;
     const auto isFirst = [&](float value) { return !(value < first) && !(value > first); };
-    while (next <= range.last && isFirst(static_cast<float>(valueAt(next)))) {
+    while (next <= range.last && isFirst(static_cast<float>(valueAt(next))))
         ++next;
-    }
-    if (next > range.last) {
+    if (next > range.last)
         return;
-    }
     extendSpan(range);
     fbxsdk::FbxAnimCurve* curve = property.GetCurve(&mLayer, property.GetName(), component, /*pCreate*/ true);
-    if (curve == nullptr) {
+    if (curve == nullptr)
         return;
-    }
     LinearKeys keys(*curve, range.rate);
-    for (std::int64_t frame = range.first; frame <= range.last; ++frame) {
+    for (std::int64_t frame = range.first; frame <= range.last; ++frame)
         keys.add(frame, static_cast<float>(valueAt(frame)));
-    }
     keys.holdLast();
 }
 
 void KeyWriter::writeKeys(fbxsdk::FbxProperty property, const char* component, const TnFbxChannel& channel,
                           double factor) {
-    if (!channel.getAnimated()) {
+    if (!channel.getAnimated())
         return;
-    }
     if (!changes(channel)) { // its frames belong to the animation all the same
         extendSpan(rangeOf(channel));
         return;
@@ -168,13 +160,11 @@ void KeyWriter::write(fbxsdk::FbxPropertyT<fbxsdk::FbxDouble>& property, const T
 
 void KeyWriter::write(fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property, const Channels3& channels) {
     fbxsdk::FbxDouble3 values;
-    for (std::size_t i = 0; i < 3; ++i) {
+    for (std::size_t i = 0; i < 3; ++i)
         values[static_cast<int>(i)] = staticValue(*channels[i]);
-    }
     property.Set(values); // before the keys: it is the value of components without any
-    for (std::size_t i = 0; i < 3; ++i) {
+    for (std::size_t i = 0; i < 3; ++i)
         writeKeys(property, kComponents[i], *channels[i], 1.0);
-    }
 }
 
 } // namespace Tarnell::Fbx::faithful

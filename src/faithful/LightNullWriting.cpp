@@ -17,11 +17,9 @@ constexpr const char* kAlpha = "the alpha of lights is not written: FBX files ha
 /// The reverse direction of a table for reading.
 template <class Value, std::size_t kCount>
 int numberOf(const detail::EnumRow<Value> (&rows)[kCount], Value value, int otherwise) {
-    for (const detail::EnumRow<Value>& row : rows) {
-        if (row.value == value) {
+    for (const detail::EnumRow<Value>& row : rows)
+        if (row.value == value)
             return row.fbx;
-        }
-    }
     return otherwise;
 }
 
@@ -41,9 +39,8 @@ void addObject(WrittenScene& scene, TnFbxLight& source) {
     keys.write(light.Intensity, *channel(TnFbxLight::kFbxLightIntensity), kFullIntensity);
     keys.write(light.OuterAngle, *channel(TnFbxLight::kFbxLightConeAngle));
     const TnFbxChannel& alpha = *channel(TnFbxLight::kFbxLightAlpha);
-    if (changes(alpha) || staticValue(alpha) != 1.0) {
+    if (changes(alpha) || staticValue(alpha) != 1.0)
         scene.warnings().add(source.getName(), kAlpha);
-    }
     detail::check(source, scene.warnings());
 }
 

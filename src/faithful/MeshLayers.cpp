@@ -18,13 +18,11 @@ template <class Value, class ElementOf>
 MappedValues<Value> firstMapped(fbxsdk::FbxMesh& mesh, const ElementOf& elementOf) {
     for (int i = 0; i < mesh.GetLayerCount(); ++i) {
         const auto* element = elementOf(*mesh.GetLayer(i));
-        if (element == nullptr) {
+        if (element == nullptr)
             continue;
-        }
         MappedValues<Value> values(*element);
-        if (values.found()) {
+        if (values.found())
             return values;
-        }
     }
     return {};
 }
@@ -43,9 +41,8 @@ std::optional<Colour> colourOf(const fbxsdk::FbxSurfaceMaterial& material) {
                       toFloat(1.0 - transparencyOf(lambert))};
     }
     const fbxsdk::FbxProperty property = material.FindProperty("DiffuseColor");
-    if (!property.IsValid()) {
+    if (!property.IsValid())
         return std::nullopt;
-    }
     const auto diffuse = property.Get<fbxsdk::FbxDouble3>();
     return Colour{toFloat(diffuse[0]), toFloat(diffuse[1]), toFloat(diffuse[2]), 1.0f};
 }
@@ -62,7 +59,8 @@ std::vector<std::optional<Colour>> materialsOf(const fbxsdk::FbxNode& node) {
 } // namespace
 
 MappedValues<fbxsdk::FbxVector4> meshNormals(fbxsdk::FbxMesh& mesh) {
-    return firstMapped<fbxsdk::FbxVector4>(mesh, [](fbxsdk::FbxLayer& layer) { return layer.GetNormals(); });
+    return firstMapped<fbxsdk::FbxVector4>(
+        mesh, [](fbxsdk::FbxLayer& layer) { return layer.GetNormals(); });
 }
 
 MappedValues<fbxsdk::FbxVector2> meshUVs(fbxsdk::FbxMesh& mesh) {
@@ -78,20 +76,17 @@ MappedValues<fbxsdk::FbxVector2> meshUVs(fbxsdk::FbxMesh& mesh) {
 MeshColours::MeshColours(fbxsdk::FbxMesh& mesh, const fbxsdk::FbxNode& node)
     : mVertexColours(
           firstMapped<fbxsdk::FbxColor>(mesh, [](fbxsdk::FbxLayer& layer) { return layer.GetVertexColors(); })) {
-    if (mVertexColours.found()) {
+    if (mVertexColours.found())
         return;
-    }
     mMaterials = materialsOf(node);
     for (int i = 0; i < mesh.GetLayerCount() && mMapping == Element::eNone; ++i) {
         const fbxsdk::FbxLayerElementMaterial* element = mesh.GetLayer(i)->GetMaterials();
-        if (element == nullptr || element->GetMappingMode() == Element::eByEdge) {
+        if (element == nullptr || element->GetMappingMode() == Element::eByEdge)
             continue;
-        }
         mMapping = element->GetMappingMode();
         mOneMaterial = true;
-        if (element->GetReferenceMode() != Element::eDirect) {
+        if (element->GetReferenceMode() != Element::eDirect)
             mMaterialIndex = &element->GetIndexArray();
-        }
     }
     if (mMapping == Element::eNone && !mMaterials.empty()) { // the material is not specified: it is the first one
         mMapping = Element::eAllSame;
@@ -100,9 +95,8 @@ MeshColours::MeshColours(fbxsdk::FbxMesh& mesh, const fbxsdk::FbxNode& node)
 }
 
 std::optional<Colour> MeshColours::at(const detail::Corner& corner) const {
-    if (const std::optional<fbxsdk::FbxColor> colour = mVertexColours.at(corner)) {
+    if (const std::optional<fbxsdk::FbxColor> colour = mVertexColours.at(corner))
         return Colour{toFloat(colour->mRed), toFloat(colour->mGreen), toFloat(colour->mBlue), toFloat(colour->mAlpha)};
-    }
     switch (mMapping) {
     case Element::eByControlPoint:
         return materialAt(corner.controlPoint);
@@ -120,9 +114,8 @@ std::optional<Colour> MeshColours::at(const detail::Corner& corner) const {
 std::optional<Colour> MeshColours::materialAt(int position) const {
     int number = position;
     if (mMaterialIndex != nullptr && (mMapping != Element::eAllSame || mMaterialIndex->GetCount() > 0)) {
-        if (position < 0 || position >= mMaterialIndex->GetCount()) {
+        if (position < 0 || position >= mMaterialIndex->GetCount())
             return std::nullopt;
-        }
         number = mMaterialIndex->GetAt(position);
     }
     return number >= 0 && static_cast<std::size_t>(number) < mMaterials.size()

@@ -45,12 +45,10 @@ struct Space {
 
 Space spaceOf(const TnFbxReadInfo& info, FbxNode& node, const FbxTime& time) {
     const FbxAMatrix geometric = geometricMatrix(node);
-    if (!info.getTransformPoints()) { // the object's own: its transform applies to them
+    if (!info.getTransformPoints()) // the object's own: its transform applies to them
         return {geometric, worldMatrix(node, time).Inverse()};
-    }
-    if (!info.getGlobalTransform()) {
+    if (!info.getGlobalTransform())
         return {localMatrix(node, time) * geometric, parentMatrix(node, time).Inverse()};
-    }
     return {worldMatrix(node, time) * geometric, FbxAMatrix()};
 }
 
@@ -59,9 +57,8 @@ class PlacedMesh {
 public:
     PlacedMesh(DeformedMesh&& deformed, const Space& space) : mDeformed(std::move(deformed)), mSpace(space) {
         const FbxAMatrix& place = mDeformed.inWorld ? mSpace.fromWorld : mSpace.fromMesh;
-        for (FbxVector4& point : mDeformed.points) {
+        for (FbxVector4& point : mDeformed.points)
             point = place.MultT(point);
-        }
         mMirrored = (handedness(place) < 0.0) != mDeformed.mirrored;
     }
 
@@ -91,9 +88,8 @@ public:
 
     std::int64_t count() const {
         std::int64_t count = 0;
-        for (int polygon = 0; polygon < mMesh.GetPolygonCount(); ++polygon) {
+        for (int polygon = 0; polygon < mMesh.GetPolygonCount(); ++polygon)
             count += std::max(mMesh.GetPolygonSize(polygon), 0);
-        }
         return count;
     }
 
@@ -116,9 +112,8 @@ private:
 };
 
 void fillLayout(FbxMesh& source, const Corners& corners, MeshArrays& arrays) {
-    for (int polygon = 0; polygon < source.GetPolygonCount(); ++polygon) {
+    for (int polygon = 0; polygon < source.GetPolygonCount(); ++polygon)
         arrays.addPolygonVertexSize(source.GetPolygonSize(polygon));
-    }
     corners.forEach([&arrays](const Corner& corner) { arrays.addPointIndex(corner.controlPoint); });
 }
 
@@ -134,9 +129,8 @@ public:
         corners.forEach([this](const Corner& corner) {
             FbxVector4& sum = mSums[keyOf(corner)];
             const FbxVector4& normal = mPolygonNormals[static_cast<std::size_t>(corner.polygon)];
-            for (int axis = 0; axis < 3; ++axis) {
+            for (int axis = 0; axis < 3; ++axis)
                 sum[axis] += normal[axis];
-            }
         });
     }
 
@@ -186,9 +180,8 @@ private:
 /// Whether there are any.
 bool fillNormals(FbxMesh& source, const Corners& corners, const PlacedMesh& placed, MeshArrays& arrays) {
     const MappedValues<FbxVector4> stored = meshNormals(source);
-    if (!stored.found()) {
+    if (!stored.found())
         return false;
-    }
     if (placed.reshaped()) {
         const ReshapedNormals normals(source, corners, stored, placed.points());
         corners.forEach([&](const Corner& corner) {
@@ -209,9 +202,8 @@ bool fillNormals(FbxMesh& source, const Corners& corners, const PlacedMesh& plac
 
 bool fillUVs(FbxMesh& source, const Corners& corners, MeshArrays& arrays) {
     const MappedValues<fbxsdk::FbxVector2> stored = meshUVs(source);
-    if (!stored.found()) {
+    if (!stored.found())
         return false;
-    }
     bool found = false;
     corners.forEach([&](const Corner& corner) {
         const std::optional<fbxsdk::FbxVector2> value = stored.at(corner);
@@ -224,9 +216,8 @@ bool fillUVs(FbxMesh& source, const Corners& corners, MeshArrays& arrays) {
 
 bool fillColours(FbxMesh& source, const FbxNode& node, const Corners& corners, MeshArrays& arrays) {
     const MeshColours stored(source, node);
-    if (!stored.found()) {
+    if (!stored.found())
         return false;
-    }
     bool found = false;
     auto* next = arrays.colours();
     corners.forEach([&](const Corner& corner) {
@@ -243,9 +234,8 @@ bool fillColours(FbxMesh& source, const FbxNode& node, const Corners& corners, M
 void fillCorners(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, bool isAlike, MeshArrays& arrays,
                  TnFbxMesh& mesh) {
     const Corners corners(source, placed.mirrored());
-    if (!isAlike) {
+    if (!isAlike)
         fillLayout(source, corners, arrays);
-    }
     mesh.setValidNormals(fillNormals(source, corners, placed, arrays));
     mesh.setValidUVs(isAlike ? mesh.getValidUVs() : fillUVs(source, corners, arrays));
     mesh.setValidColours(fillColours(source, node, corners, arrays));
@@ -263,12 +253,10 @@ void fillMesh(FbxMesh& source, const FbxNode& node, const PlacedMesh& placed, st
         arrays.allocatePoints(static_cast<int>(placed.points().size()));
         hasPolygons = false;
     }
-    for (const FbxVector4& point : placed.points()) {
+    for (const FbxVector4& point : placed.points())
         arrays.addControlPoint({toFloat(point[0]), toFloat(point[1]), toFloat(point[2])});
-    }
-    if (hasPolygons) {
+    if (hasPolygons)
         fillCorners(source, node, placed, alike != nullptr, arrays, mesh);
-    }
 }
 
 /// The memory of a mesh's arrays: for each corner an index, a normal, a texture coordinate and a colour.
@@ -307,22 +295,19 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
     const bool isKnown = scene.instances().find(straight) != nullptr || scene.instances().find(reversed) != nullptr;
     const std::uint64_t all = bytesOf(source, cornerCount);
     const std::uint64_t granted = isKnown ? bytesOfAnother(source, cornerCount) : all;
-    if (!scene.grantBytes(granted) || !readNode(scene, info, node, static_cast<TnFbxTransform&>(mesh))) {
+    if (!scene.grantBytes(granted) || !readNode(scene, info, node, static_cast<TnFbxTransform&>(mesh)))
         return false;
-    }
     const FbxTime time = scene.now();
     const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
     const MeshInstances::Source& kept = placed.mirrored() ? reversed : straight;
     const MeshInstances::Geometry* alike = findAlike(scene, kept, placed.points().size());
-    if (alike == nullptr && !scene.grantBytes(all - granted)) {
+    if (alike == nullptr && !scene.grantBytes(all - granted))
         return false;
-    }
     try {
         fillMesh(source, node, placed, cornerCount, alike, mesh);
         mesh.setPointsPlaced(info.getTransformPoints());
-        if (source.GetNodeCount() > 1) {
+        if (source.GetNodeCount() > 1)
             scene.giveBackBytes(scene.instances().keep(kept, mesh));
-        }
         return true;
     } catch (const std::runtime_error& error) { // the platform's message about a layer element without its array
         mesh.initMesh();
@@ -336,9 +321,8 @@ bool addPoints(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh
     // Points that are shared so far become the mesh's own.
     const int sets = 1 + (MeshArrays::sharesPoints(mesh) ? mesh.getNumberOfControlPointSets() : 0);
     if (!scene.grantBytes(static_cast<std::uint64_t>(mesh.getNumberOfControlPoints()) * 3 * sizeof(float) *
-                          static_cast<std::uint64_t>(sets))) {
+                          static_cast<std::uint64_t>(sets)))
         return false;
-    }
     const FbxTime time = scene.now();
     const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
     if (placed.points().size() != static_cast<std::size_t>(mesh.getNumberOfControlPoints())) {
@@ -346,9 +330,8 @@ bool addPoints(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh
                             "\" has a different number of control points than before");
     }
     mesh.addControlPointSet();
-    for (const FbxVector4& point : placed.points()) {
+    for (const FbxVector4& point : placed.points())
         mesh.addControlPoint(toFloat(point[0]), toFloat(point[1]), toFloat(point[2]));
-    }
     return true;
 }
 

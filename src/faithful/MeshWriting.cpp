@@ -92,20 +92,17 @@ std::optional<TnFbxMesh> unplaced(WrittenScene& scene, const TnFbxMesh& source) 
     const FbxAMatrix place = staticMatrixOf(source);
     const double hand = handedness(place);
     const FrameRange frames{cacheRange(scene).getStartFrame(), cacheRange(scene).getEndFrame(), scene.rate()};
-    if (hand == 0.0) {
+    if (hand == 0.0)
         return std::nullopt;
-    }
     transformPoints(mesh, 0, place.Inverse());
     for (int set = 1; set < source.getNumberOfControlPointSets(); ++set) {
         const FbxAMatrix there = matrixAt(scene.keys(), mesh, frames.first + set, frames);
-        if (handedness(there) == 0.0) {
+        if (handedness(there) == 0.0)
             return std::nullopt;
-        }
         transformPoints(mesh, set, there.Inverse());
     }
-    if (hand < 0.0) {
+    if (hand < 0.0)
         reversePolygons(source, mesh);
-    }
     transformNormals(mesh, place.Inverse());
     return mesh;
 }
@@ -113,12 +110,10 @@ std::optional<TnFbxMesh> unplaced(WrittenScene& scene, const TnFbxMesh& source) 
 /// Removes the mesh's cache again.
 void dropCache(fbxsdk::FbxNode& node) {
     fbxsdk::FbxCache* cache = detail::pointCacheOf(node);
-    if (fbxsdk::FbxVertexCacheDeformer* deformer = detail::pointCacheDeformerOf(node)) {
+    if (fbxsdk::FbxVertexCacheDeformer* deformer = detail::pointCacheDeformerOf(node))
         deformer->Destroy();
-    }
-    if (cache != nullptr) {
+    if (cache != nullptr)
         cache->Destroy();
-    }
 }
 
 bool writeCache(WrittenScene& scene, const TnFbxMesh& mesh, fbxsdk::FbxNode& node) {
@@ -128,24 +123,21 @@ bool writeCache(WrittenScene& scene, const TnFbxMesh& mesh, fbxsdk::FbxNode& nod
     const std::string name = scene.cacheNameFor(mesh.getName());
     const auto place = detail::pointCachePlace(info.getFileName(), name.c_str(), maya ? ".xml" : ".pc2");
     if (!detail::attachPointCache(scene.manager(), *node.GetGeometry(), place, name.c_str(), maya,
-                                  /*withScene*/ true)) {
+                                  /*withScene*/ true))
         return false;
-    }
     const TnFbxTime range = cacheRange(scene);
     const detail::PointCacheForm form = {name.c_str(), maya, wide, scene.rate()};
     fbxsdk::FbxStatus status;
     fbxsdk::FbxCache& cache = *detail::pointCacheOf(node);
-    if (!detail::openPointCache(cache, mesh, range, form, status)) {
+    if (!detail::openPointCache(cache, mesh, range, form, status))
         return detail::fail(status.GetErrorString());
-    }
     detail::writePointSamples(cache, mesh, range, form); // only closing reports whether it worked
     return cache.CloseFile(&status) || detail::fail(status.GetErrorString());
 }
 
 void addCache(WrittenScene& scene, const TnFbxMesh& mesh, fbxsdk::FbxNode& node) {
-    if (mesh.getNumberOfControlPointSets() < 2) {
+    if (mesh.getNumberOfControlPointSets() < 2)
         return;
-    }
     if (!scene.info().getAnimateMeshVertices()) {
         scene.warnings().add(mesh.getName(), kNoCache);
     } else if (detail::pointCacheFault(mesh, cacheRange(scene)) != nullptr) {

@@ -19,9 +19,8 @@ constexpr auto kSource = FbxNode::eSourcePivot;
 
 RotationOrder orderInForce(const FbxNode& node) {
     fbxsdk::FbxEuler::EOrder order = fbxsdk::FbxEuler::eOrderXYZ;
-    if (node.GetRotationActive()) {
+    if (node.GetRotationActive())
         node.GetRotationOrder(kSource, order);
-    }
     return detail::rotationOrderOf(order);
 }
 
@@ -77,9 +76,8 @@ private:
 };
 
 void setStill(TnFbxTransform& object, const Values& values) {
-    for (std::size_t i = 0; i < kChannels; ++i) {
+    for (std::size_t i = 0; i < kChannels; ++i)
         object.setTransformValue(channelAt(i), toFloat(values[i]));
-    }
 }
 
 void readStill(Scene& scene, const Placement& placement, RotationOrder order, TnFbxTransform& object) {
@@ -94,11 +92,9 @@ void readStill(Scene& scene, const Placement& placement, RotationOrder order, Tn
 /// Whether two matrices are equal except for their translation.
 bool standAlike(const Matrix& a, const Matrix& b) {
     for (int axis = 0; axis < 3; ++axis) {
-        for (int component = 0; component < 3; ++component) {
-            if (!(a.Get(axis, component) == b.Get(axis, component))) {
+        for (int component = 0; component < 3; ++component)
+            if (!(a.Get(axis, component) == b.Get(axis, component)))
                 return false;
-            }
-        }
     }
     return true;
 }
@@ -118,9 +114,8 @@ public:
     Values at(const FbxTime& time) {
         const Matrix matrix = mPlacement.matrixAt(time);
         if (mAny && !mOwnChanges && standAlike(matrix, mMatrix)) {
-            for (int i = 0; i < 3; ++i) {
+            for (int i = 0; i < 3; ++i)
                 mParts.position[static_cast<std::size_t>(i)] = matrix.Get(3, i);
-            }
             return valuesOf(mParts, mAngles);
         }
         mAny = true;
@@ -151,33 +146,28 @@ private:
 
 bool readMoving(Scene& scene, const Placement& placement, RotationOrder order, TnFbxTransform& object) {
     const Timeline& timeline = scene.timeline();
-    if (!scene.grantSamples(0)) {
+    if (!scene.grantSamples(0))
         return false;
-    }
     Runs<kChannels> samples(scene);
     Runs<3> ownAngles(scene);
     MovingPlacement moving(scene, placement, order);
     moving.begin(timeline.at(static_cast<double>(timeline.first())));
     Vector nearNow = moving.angles();
     for (std::int64_t frame = timeline.first(); frame <= timeline.last(); ++frame) {
-        if (!samples.add(moving.at(timeline.at(static_cast<double>(frame))))) {
+        if (!samples.add(moving.at(timeline.at(static_cast<double>(frame)))))
             return false;
-        }
-        if (static_cast<double>(frame) <= static_cast<double>(scene.frame())) {
+        if (static_cast<double>(frame) <= static_cast<double>(scene.frame()))
             nearNow = moving.angles();
-        }
-        if (moving.own().fit() && !ownAngles.add(moving.ownAngles())) {
+        if (moving.own().fit() && !ownAngles.add(moving.ownAngles()))
             return false;
-        }
     }
     const bool isOwn = moving.own().fit();
     const Parts now = partsAt(placement, scene.now());
     setStill(object, valuesOf(now, isOwn ? moving.own().at(scene.now()) : anglesNear(now.rotation, order, nearNow)));
     for (std::size_t i = 0; i < kChannels; ++i) {
         detail::SampleRun& run = isOwn && i >= 3 && i < 6 ? ownAngles[i - 3] : samples[i];
-        if (!run.isOneValue()) {
+        if (!run.isOneValue())
             run.moveInto(*object.getTransformChannel(channelAt(i)), timeline.record(scene.frame()));
-        }
     }
     return true;
 }
@@ -195,9 +185,8 @@ Matrix parentMatrix(FbxNode& node, const FbxTime& time) {
 
 Matrix localMatrix(FbxNode& node, const FbxTime& time) {
     const Matrix parent = parentMatrix(node, time);
-    if (handedness(parent) == 0.0) { // a flattened space has no inverse
+    if (handedness(parent) == 0.0) // a flattened space has no inverse
         return node.EvaluateLocalTransform(time, kSource, /*pApplyTarget*/ false, /*pForceEval*/ false);
-    }
     return parent.Inverse() * worldMatrix(node, time);
 }
 
@@ -217,9 +206,8 @@ Placement placementOf(Scene& scene, FbxNode& node, bool global) {
 bool readPlacement(Scene& scene, const Placement& placement, TnFbxTransform& object) {
     const RotationOrder order = orderInForce(placement.node);
     object.setTransformRotationOrder(order);
-    if (placement.moves) {
+    if (placement.moves)
         return readMoving(scene, placement, order, object);
-    }
     readStill(scene, placement, order, object);
     return true;
 }

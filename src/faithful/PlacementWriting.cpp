@@ -25,8 +25,9 @@ constexpr const char* kComponents[] = {"X", "Y", "Z"};
 constexpr const char* kPivots = "pivots are not written: whether they apply to rotation or scale is not specified";
 
 bool anySet(const Channels3& channels) {
-    return std::any_of(channels.begin(), channels.end(),
-                       [](const TnFbxChannel* channel) { return changes(*channel) || staticValue(*channel) != 0.0; });
+    return std::any_of(
+        channels.begin(), channels.end(),
+        [](const TnFbxChannel* channel) { return changes(*channel) || staticValue(*channel) != 0.0; });
 }
 
 Vector valuesAt(const KeyWriter& keys, const Channels3& channels, std::int64_t frame, const FrameRange& range) {
@@ -51,9 +52,9 @@ public:
     void write(KeyWriter& keys, fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property, const FrameRange& range) const {
         property.Set(fbxsdk::FbxDouble3(mValues[0][0], mValues[0][1], mValues[0][2]));
         for (std::size_t i = 0; i < 3; ++i) {
-            keys.writeKeys(property, kComponents[i], range, [&](std::int64_t frame) {
-                return mValues[static_cast<std::size_t>(frame - range.first)][i];
-            });
+            keys.writeKeys(
+                property, kComponents[i], range,
+                [&](std::int64_t frame) { return mValues[static_cast<std::size_t>(frame - range.first)][i]; });
         }
     }
 
@@ -94,9 +95,8 @@ FbxAMatrix composed(const Vector& position, const FbxAMatrix& rotation, const Ve
     shear[2][1] = skew[2];
     FbxAMatrix matrix = rotation * shear;
     for (int axis = 0; axis < 3; ++axis) {
-        for (int component = 0; component < 3; ++component) {
+        for (int component = 0; component < 3; ++component)
             matrix[axis][component] *= scale[static_cast<std::size_t>(axis)];
-        }
         matrix[3][axis] = position[static_cast<std::size_t>(axis)];
     }
     return matrix;
@@ -125,7 +125,8 @@ Channels3 channelsFrom(TnFbxTransform& object, Channel first) {
 }
 
 FbxAMatrix matrixAt(const KeyWriter& keys, TnFbxTransform& object, std::int64_t frame, const FrameRange& range) {
-    return composedOf(object, [&](const Channels3& channels) { return valuesAt(keys, channels, frame, range); });
+    return composedOf(
+        object, [&](const Channels3& channels) { return valuesAt(keys, channels, frame, range); });
 }
 
 FbxAMatrix staticMatrixOf(const TnFbxTransform& object) {
@@ -138,9 +139,8 @@ FbxAMatrix staticMatrixOf(const TnFbxTransform& object) {
 
 FbxNode& addPlacedNode(WrittenScene& scene, TnFbxTransform& object, const NodeAxes& axes) {
     KeyWriter& keys = scene.keys();
-    if (anySet(channelsFrom(object, TnFbxTransform::kFbxTransformPivotX))) {
+    if (anySet(channelsFrom(object, TnFbxTransform::kFbxTransformPivotX)))
         scene.warnings().add(object.getName(), kPivots);
-    }
     const bool skewed = anySet(channelsFrom(object, TnFbxTransform::kFbxTransformSkewX));
     FbxNode* upper = skewed ? &scene.addNode(object.getName() + " skew") : nullptr;
     FbxNode& node = scene.addNode(object.getName(), upper);

@@ -39,16 +39,12 @@ inline bool isRate(double rate) { return std::isfinite(rate) && rate > 0.0; }
 inline RateRow exactRate(float framesPerSecond) {
     constexpr double kTolerance = 2e-6; // 23.976 is 1e-6 below the rate it means
     const auto rate = static_cast<double>(framesPerSecond);
-    for (const RateRow& row : kTelevisionRates) {
-        if (std::fabs(rate - row.rate) < kTolerance * row.rate) {
+    for (const RateRow& row : kTelevisionRates)
+        if (std::fabs(rate - row.rate) < kTolerance * row.rate)
             return row;
-        }
-    }
-    for (const RateRow& row : kWholeRates) {
-        if (!(rate < row.rate) && !(rate > row.rate)) {
+    for (const RateRow& row : kWholeRates)
+        if (!(rate < row.rate) && !(rate > row.rate))
             return row;
-        }
-    }
     return {fbxsdk::FbxTime::eCustom, rate};
 }
 

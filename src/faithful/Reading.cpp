@@ -66,15 +66,13 @@ constexpr bool kNeedsMeshes<TnFbxMesh> = true;
 /// The nodes of a read, parents before their children.
 template <class Object>
 std::vector<FbxNode*> nodesOf(Scene& scene, const TnFbxReadInfo& info) {
-    if (kNeedsMeshes<Object>) {
+    if (kNeedsMeshes<Object>)
         triangulateSurfaces(scene);
-    }
     std::vector<FbxNode*> nodes;
     detail::walkBelow(scene.scene().GetRootNode(), [&](FbxNode& node) {
         const bool asked = info.getAllObjects() || info.getObjectName() == node.GetName();
-        if (asked && isOfKind<Object>(node) && !isProducer(scene.scene(), node)) {
+        if (asked && isOfKind<Object>(node) && !isProducer(scene.scene(), node))
             nodes.push_back(&node);
-        }
         return info.getAllObjects() || nodes.empty();
     });
     return nodes;
@@ -88,10 +86,9 @@ void triangulateSurfaces(Scene& scene) {
         triangulation.visit(node);
         const Attribute::EType type = typeOf(node);
         if (type == Attribute::eNurbs || type == Attribute::ePatch || type == Attribute::eNurbsSurface ||
-            type == Attribute::eTrimNurbsSurface) {
+            type == Attribute::eTrimNurbsSurface)
             detail::warn(scene.fileName() + ": the surface of \"" + node.GetName() +
                          "\" cannot be converted to a mesh");
-        }
         return true;
     });
     triangulation.warnOfCoarser();
@@ -100,19 +97,16 @@ void triangulateSurfaces(Scene& scene) {
 template <class Object>
 bool readObjects(Scene& scene, const TnFbxReadInfo& info, Object** objects, int& count) {
     const std::vector<FbxNode*> nodes = nodesOf<Object>(scene, info);
-    if (!scene.grantBytes(nodes.size() * sizeof(Object))) {
+    if (!scene.grantBytes(nodes.size() * sizeof(Object)))
         return false;
-    }
-    if (nodes.empty()) {
+    if (nodes.empty())
         return detail::succeed();
-    }
     *objects = new Object[nodes.size()];
     count = static_cast<int>(nodes.size());
     for (std::size_t i = 0; i < nodes.size(); ++i) {
         (*objects)[i].setName(nodes[i]->GetName());
-        if (!readNode(scene, info, *nodes[i], (*objects)[i])) {
+        if (!readNode(scene, info, *nodes[i], (*objects)[i]))
             return false;
-        }
     }
     scene.warnings().report();
     scene.warnings().forget();
@@ -121,10 +115,12 @@ bool readObjects(Scene& scene, const TnFbxReadInfo& info, Object** objects, int&
 
 template <class Object>
 bool readObjects(const TnFbxReadInfo& info, Object** objects, int& count) {
-    return detail::failOnFault(info.getFileName(), [&] {
-        Scene scene;
-        return scene.load(info) && readObjects(scene, info, objects, count);
-    });
+    return detail::failOnFault(
+        info.getFileName(),
+        [&] {
+            Scene scene;
+            return scene.load(info) && readObjects(scene, info, objects, count);
+        });
 }
 
 template bool readObjects(const TnFbxReadInfo&, TnFbxMesh**, int&);

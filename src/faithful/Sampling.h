@@ -32,9 +32,8 @@ template <std::size_t kCount>
 class Runs {
 public:
     explicit Runs(Scene& scene) : mScene(scene) {
-        for (detail::SampleRun& run : mRuns) {
+        for (detail::SampleRun& run : mRuns)
             run.begin(static_cast<std::size_t>(scene.timeline().count()));
-        }
     }
 
     /// False, with the reason noted, when there is not enough memory.
@@ -42,9 +41,8 @@ public:
     bool add(const Values& values) {
         for (std::size_t i = 0; i < kCount; ++i) {
             const float value = toFloat(values[i]) + 0.0f; // zero and minus zero are equal
-            if (mRuns[i].spreadsWith(value) && !mScene.grantSamples(1)) {
+            if (mRuns[i].spreadsWith(value) && !mScene.grantSamples(1))
                 return false;
-            }
             mRuns[i].add(value);
         }
         return true;
@@ -65,27 +63,20 @@ bool fillChannels(Scene& scene, bool animated, Object& object, Channel firstChan
         return static_cast<Channel>(static_cast<int>(firstChannel) + static_cast<int>(i));
     };
     const std::array<double, kCount> now = valuesAt(scene.now());
-    for (std::size_t i = 0; i < kCount; ++i) {
+    for (std::size_t i = 0; i < kCount; ++i)
         setStatic(object, channelAt(i), toFloat(now[i]));
-    }
-    if (!animated) {
+    if (!animated)
         return true;
-    }
-    if (!scene.grantSamples(0)) {
+    if (!scene.grantSamples(0))
         return false;
-    }
     const Timeline& timeline = scene.timeline();
     Runs<kCount> samples(scene);
-    for (std::int64_t frame = timeline.first(); frame <= timeline.last(); ++frame) {
-        if (!samples.add(valuesAt(timeline.at(static_cast<double>(frame))))) {
+    for (std::int64_t frame = timeline.first(); frame <= timeline.last(); ++frame)
+        if (!samples.add(valuesAt(timeline.at(static_cast<double>(frame)))))
             return false;
-        }
-    }
-    for (std::size_t i = 0; i < kCount; ++i) {
-        if (!samples[i].isOneValue()) { // samples that are all equal are no animation
+    for (std::size_t i = 0; i < kCount; ++i)
+        if (!samples[i].isOneValue()) // samples that are all equal are no animation
             object.moveValuesAt(channelAt(i), timeline.record(scene.frame()), samples[i].takeAll());
-        }
-    }
     return true;
 }
 

@@ -30,24 +30,19 @@ std::vector<Object*> sourcesOf(Owner& owner) {
     std::vector<Object*> objects;
     const auto isOne = fbxsdk::FbxCriteria::ObjectType(Object::ClassId);
     const int count = owner.GetSrcObjectCount(isOne);
-    for (int i = 0; i < count; ++i) {
-        if (auto* object = fbxsdk::FbxCast<Object>(owner.GetSrcObject(isOne, i))) {
+    for (int i = 0; i < count; ++i)
+        if (auto* object = fbxsdk::FbxCast<Object>(owner.GetSrcObject(isOne, i)))
             objects.push_back(object);
-        }
-    }
     return objects;
 }
 
 double exactRate(const fbxsdk::FbxGlobalSettings& settings) {
     const fbxsdk::FbxTime::EMode mode = settings.GetTimeMode();
-    for (const RateRow& row : kTelevisionRates) {
-        if (row.mode == mode) {
+    for (const RateRow& row : kTelevisionRates)
+        if (row.mode == mode)
             return row.rate;
-        }
-    }
-    if (mode != fbxsdk::FbxTime::eCustom) {
+    if (mode != fbxsdk::FbxTime::eCustom)
         return fbxsdk::FbxTime::GetFrameRate(mode);
-    }
     const double rate = settings.GetCustomFrameRate();
     return std::isfinite(rate) && rate > 0.0 ? rate : kRateOfNoRate;
 }
@@ -56,9 +51,8 @@ bool import(fbxsdk::FbxManager& manager, fbxsdk::FbxScene& scene, const std::str
     fbxsdk::FbxImporter* importer = fbxsdk::FbxImporter::Create(&manager, "");
     const bool imported = importer->Initialize(fileName.c_str(), /*pFileFormat: detect*/ -1, /*pIOSettings*/ nullptr) &&
                           importer->Import(&scene, /*pNonBlocking*/ false);
-    if (!imported) {
+    if (!imported)
         failAbout(fileName, importer->GetStatus().GetErrorString(), "cannot be read");
-    }
     detail::warnOfRepairs(fileName, importer->GetFileHeaderInfo());
     importer->Destroy(/*pRecursive*/ false);
     return imported;
@@ -66,31 +60,27 @@ bool import(fbxsdk::FbxManager& manager, fbxsdk::FbxScene& scene, const std::str
 
 std::string listed(const std::vector<fbxsdk::FbxAnimStack*>& stacks) {
     std::string text;
-    for (const fbxsdk::FbxAnimStack* stack : stacks) {
+    for (const fbxsdk::FbxAnimStack* stack : stacks)
         text += (text.empty() ? "\"" : ", \"") + std::string(stack->GetName()) + '"';
-    }
     return text.empty() ? "none" : text;
 }
 
 } // namespace
 
 Scene::~Scene() {
-    if (mManager != nullptr) {
+    if (mManager != nullptr)
         mManager->Destroy();
-    }
 }
 
 bool Scene::load(const TnFbxReadInfo& info) {
     mFileName = info.getFileName();
     mMemory.begin();
     mManager = fbxsdk::FbxManager::Create();
-    if (mManager == nullptr) {
+    if (mManager == nullptr)
         return fail("the FBX manager cannot be created");
-    }
     mScene = fbxsdk::FbxScene::Create(mManager, "");
-    if (!import(*mManager, *mScene, mFileName)) {
+    if (!import(*mManager, *mScene, mFileName))
         return false;
-    }
     const fbxsdk::FbxGlobalSettings& settings = mScene->GetGlobalSettings();
     const double unit = settings.GetSystemUnit().GetScaleFactor();
     detail::convertToCentimetres(*mScene);
@@ -109,9 +99,8 @@ bool Scene::select(const TnFbxReadInfo& info) {
     }
     mStack = formerStack;
     mLayers = formerLayers;
-    if (mStack != nullptr) {
+    if (mStack != nullptr)
         mScene->SetCurrentAnimationStack(mStack);
-    }
     return false;
 }
 
@@ -135,21 +124,18 @@ bool Scene::selectFrames(const TnFbxReadInfo& info) {
     fbxsdk::FbxTime::SetGlobalTimeMode(settings.GetTimeMode(), settings.GetCustomFrameRate());
     mFileRate = exactRate(settings);
     const double rate = info.getUseSampleFPS() ? exactRate(info.getSampleFPS()).rate : mFileRate;
-    if (!std::isfinite(rate) || !(rate > 0.0)) {
+    if (!std::isfinite(rate) || !(rate > 0.0))
         return fail("a sample rate of " + std::to_string(rate) + " frames per second is not valid");
-    }
     const Timeline former = std::exchange(mTimeline, Timeline(rate, animatedSpan()));
-    if (setFrame(info.getFrame())) {
+    if (setFrame(info.getFrame()))
         return true;
-    }
     mTimeline = former;
     return false;
 }
 
 bool Scene::setFrame(float frame) {
-    if (!std::isfinite(frame)) {
+    if (!std::isfinite(frame))
         return fail("the frame of the static values is not a finite number");
-    }
     mFrame = frame;
     mNow = mTimeline.at(static_cast<double>(frame));
     return true;
@@ -157,42 +143,34 @@ bool Scene::setFrame(float frame) {
 
 /// The stack's own span and that of its keys.
 fbxsdk::FbxTimeSpan Scene::animatedSpan() {
-    if (mStack == nullptr) {
+    if (mStack == nullptr)
         return {};
-    }
     fbxsdk::FbxTimeSpan span = mStack->GetLocalTimeSpan();
     const bool stated = span.GetStart() < span.GetStop();
     fbxsdk::FbxTimeSpan keys(fbxsdk::FBXSDK_TIME_INFINITE, fbxsdk::FBXSDK_TIME_MINUS_INFINITE);
     bool keyed = false;
-    for (int layer = 0; layer < static_cast<int>(mLayers.size()); ++layer) {
+    for (int layer = 0; layer < static_cast<int>(mLayers.size()); ++layer)
         keyed = mScene->GetRootNode()->GetAnimationInterval(keys, mStack, layer) || keyed;
-    }
-    if (!keyed) {
+    if (!keyed)
         return stated ? span : fbxsdk::FbxTimeSpan();
-    }
-    if (!stated) {
+    if (!stated)
         return keys;
-    }
     span.UnionAssignment(keys);
     return span;
 }
 
 bool Scene::isKeyed(fbxsdk::FbxProperty property) const {
-    for (fbxsdk::FbxAnimLayer* layer : mLayers) {
-        if (property.IsAnimated(layer)) {
+    for (fbxsdk::FbxAnimLayer* layer : mLayers)
+        if (property.IsAnimated(layer))
             return true;
-        }
-    }
     return false;
 }
 
 bool Scene::isKeyed(const fbxsdk::FbxObject& object) const {
     for (fbxsdk::FbxProperty property = object.GetFirstProperty(); property.IsValid();
-         property = object.GetNextProperty(property)) {
-        if (isKeyed(property)) {
+         property = object.GetNextProperty(property))
+        if (isKeyed(property))
             return true;
-        }
-    }
     return false;
 }
 
@@ -209,9 +187,8 @@ bool Scene::moves(fbxsdk::FbxNode& node) {
         moving = isKeyed(at->LclTranslation) || isKeyed(at->LclRotation) || isKeyed(at->LclScaling);
     }
     // The visited nodes are at and below the animated one, or none of them is animated.
-    for (const fbxsdk::FbxNode* each : above) {
+    for (const fbxsdk::FbxNode* each : above)
         mMoves[each] = moving;
-    }
     return moving;
 }
 

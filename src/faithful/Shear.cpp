@@ -14,21 +14,17 @@ using Columns = std::array<Vector, 3>;
 
 Columns columnsOf(const fbxsdk::FbxAMatrix& matrix) {
     Columns columns{};
-    for (int axis = 0; axis < 3; ++axis) {
-        for (int component = 0; component < 3; ++component) {
+    for (int axis = 0; axis < 3; ++axis)
+        for (int component = 0; component < 3; ++component)
             columns[static_cast<std::size_t>(axis)][static_cast<std::size_t>(component)] = matrix.Get(axis, component);
-        }
-    }
     return columns;
 }
 
 fbxsdk::FbxAMatrix matrixOf(const Columns& columns) {
     fbxsdk::FbxAMatrix matrix;
-    for (int axis = 0; axis < 3; ++axis) {
-        for (int component = 0; component < 3; ++component) {
+    for (int axis = 0; axis < 3; ++axis)
+        for (int component = 0; component < 3; ++component)
             matrix[axis][component] = columns[static_cast<std::size_t>(axis)][static_cast<std::size_t>(component)];
-        }
-    }
     return matrix;
 }
 
@@ -60,9 +56,8 @@ ShearParts partsOfShear(const Vector& skew, const fbxsdk::FbxAMatrix& nearBasis)
             for (std::size_t j = i + 1; j < 3; ++j) {
                 const double product = dot(images[i], images[j]);
                 const double first = dot(images[i], images[i]), second = dot(images[j], images[j]);
-                if (std::fabs(product) <= 1e-15 * std::sqrt(first * second)) {
+                if (std::fabs(product) <= 1e-15 * std::sqrt(first * second))
                     continue;
-                }
                 perpendicular = false;
                 const double zeta = (second - first) / (2.0 * product);
                 const double t = (zeta < 0.0 ? -1.0 : 1.0) / (std::fabs(zeta) + std::sqrt(1.0 + zeta * zeta));
@@ -71,16 +66,14 @@ ShearParts partsOfShear(const Vector& skew, const fbxsdk::FbxAMatrix& nearBasis)
                 turnPair(basis[i], basis[j], c, c * t);
             }
         }
-        if (perpendicular) {
+        if (perpendicular)
             break;
-        }
     }
     ShearParts parts;
     for (std::size_t i = 0; i < 3; ++i) {
         parts.stretch[i] = std::sqrt(dot(images[i], images[i]));
-        for (double& component : images[i]) {
+        for (double& component : images[i])
             component /= parts.stretch[i];
-        }
     }
     parts.turn = matrixOf(images);
     parts.basis = matrixOf(basis);

@@ -24,18 +24,15 @@ using fbxsdk::FbxTime;
 constexpr double kNoWeight = 1e-12;
 
 void addScaled(Matrix& sum, const Matrix& matrix, double weight) {
-    for (int row = 0; row < 4; ++row) {
-        for (int column = 0; column < 3; ++column) {
+    for (int row = 0; row < 4; ++row)
+        for (int column = 0; column < 3; ++column)
             sum[row][column] += matrix[row][column] * weight;
-        }
-    }
 }
 
 Matrix zeroMatrix() {
     Matrix matrix;
-    for (int axis = 0; axis < 3; ++axis) {
+    for (int axis = 0; axis < 3; ++axis)
         matrix[axis][axis] = 0.0;
-    }
     return matrix;
 }
 
@@ -71,9 +68,8 @@ Matrix rigidMotion(const DualQuaternion& blend) {
     const auto& r = blend.real;
     const double square = r[0] * r[0] + r[1] * r[1] + r[2] * r[2] + r[3] * r[3];
     Matrix matrix;
-    if (!(square > 0.0)) {
+    if (!(square > 0.0))
         return matrix;
-    }
     const double length = std::sqrt(square);
     const std::array<double, 4> conjugate = {-r[0], -r[1], -r[2], r[3]};
     const std::array<double, 4> moved = product(blend.dual, conjugate);
@@ -95,9 +91,8 @@ Influence influenceOf(const Matrix& motion) {
     const Parts parts = decompose(motion, {1.0, 1.0, 1.0});
     influence.stretch = parts.rotation.Transpose() * motion;
     influence.stretch.SetT(Point(0.0, 0.0, 0.0));
-    for (int axis = 0; axis < 3; ++axis) {
+    for (int axis = 0; axis < 3; ++axis)
         influence.stretch[3][axis] = 0.0;
-    }
     influence.rigid = dualQuaternion(parts.rotation, parts.position);
     return influence;
 }
@@ -114,9 +109,8 @@ struct Sum {
         addScaled(motion, influence.motion, share);
         if (dual) {
             double sameSide = 0.0;
-            for (std::size_t i = 0; i < 4; ++i) {
+            for (std::size_t i = 0; i < 4; ++i)
                 sameSide += rigid.real[i] * influence.rigid.real[i];
-            }
             rigid.add(influence.rigid, sameSide < 0.0 ? -share : share);
             addScaled(stretch, influence.stretch, share);
         }
@@ -155,9 +149,8 @@ Matrix motionOf(const Cluster& cluster, const Binding& binding) {
 Matrix relativeMotionOf(const Cluster& cluster, const Binding& binding) {
     fbxsdk::FbxNode* associate = cluster.GetAssociateModel();
     const Matrix motion = motionOf(cluster, binding);
-    if (associate == nullptr) {
+    if (associate == nullptr)
         return binding.place.Inverse() * motion;
-    }
     Matrix bound, associateBound;
     cluster.GetTransformMatrix(bound);
     cluster.GetTransformAssociateModelMatrix(associateBound);
@@ -171,11 +164,9 @@ void forEachWeight(const Cluster& cluster, std::size_t pointCount, const Visit& 
     const int* indices = cluster.GetControlPointIndices();
     const double* weights = cluster.GetControlPointWeights();
     const int count = indices != nullptr && weights != nullptr ? cluster.GetControlPointIndicesCount() : 0;
-    for (int i = 0; i < count; ++i) {
-        if (indices[i] >= 0 && static_cast<std::size_t>(indices[i]) < pointCount && weights[i] != 0.0) {
+    for (int i = 0; i < count; ++i)
+        if (indices[i] >= 0 && static_cast<std::size_t>(indices[i]) < pointCount && weights[i] != 0.0)
             visit(static_cast<std::size_t>(indices[i]), weights[i]);
-        }
-    }
 }
 
 /// The share of dual quaternions at each point.
@@ -185,11 +176,9 @@ std::vector<double> dualShares(const Skin& skin, std::size_t pointCount) {
     const int* indices = skin.GetControlPointIndices();
     const double* weights = skin.GetControlPointBlendWeights();
     const bool blended = skin.GetSkinningType() == Skin::eBlend && indices != nullptr && weights != nullptr;
-    for (int i = 0; blended && i < skin.GetControlPointIndicesCount(); ++i) {
-        if (indices[i] >= 0 && static_cast<std::size_t>(indices[i]) < pointCount) {
+    for (int i = 0; blended && i < skin.GetControlPointIndicesCount(); ++i)
+        if (indices[i] >= 0 && static_cast<std::size_t>(indices[i]) < pointCount)
             shares[static_cast<std::size_t>(indices[i])] = weights[i];
-        }
-    }
     return shares;
 }
 
@@ -197,20 +186,17 @@ std::vector<Skin*> skinsOf(const fbxsdk::FbxMesh& mesh) {
     std::vector<Skin*> skins;
     for (int i = 0; i < mesh.GetDeformerCount(fbxsdk::FbxDeformer::eSkin); ++i) {
         auto* skin = fbxsdk::FbxCast<Skin>(mesh.GetDeformer(i, fbxsdk::FbxDeformer::eSkin));
-        if (skin != nullptr && skin->GetClusterCount() > 0) {
+        if (skin != nullptr && skin->GetClusterCount() > 0)
             skins.push_back(skin);
-        }
     }
     return skins;
 }
 
 template <class Visit>
 void forEachCluster(const std::vector<Skin*>& skins, const Visit& visit) {
-    for (Skin* skin : skins) {
-        for (int i = 0; i < skin->GetClusterCount(); ++i) {
+    for (Skin* skin : skins)
+        for (int i = 0; i < skin->GetClusterCount(); ++i)
             visit(*skin->GetCluster(i));
-        }
-    }
 }
 
 /// Each influence moves the point as moved by those before it.
@@ -225,9 +211,8 @@ std::vector<Matrix> chainedMotions(const std::vector<Skin*>& skins, const Bindin
             motions[point] = influence * motions[point];
         });
     });
-    for (Matrix& motion : motions) {
+    for (Matrix& motion : motions)
         motion = binding.place * motion;
-    }
     return motions;
 }
 
@@ -250,9 +235,8 @@ std::vector<Matrix> blendedMotions(const std::vector<Skin*>& skins, const Bindin
             motions[i] = binding.place;
             continue;
         }
-        if (mode == Cluster::eTotalOne) {
+        if (mode == Cluster::eTotalOne)
             sum.add(still, 1.0 - sum.weight, dual[i] != 0.0);
-        }
         Matrix motion = zeroMatrix();
         addScaled(motion, sum.motion, (1.0 - dual[i]) / sum.weight);
         if (dual[i] != 0.0) {
@@ -269,9 +253,8 @@ std::vector<Matrix> blendedMotions(const std::vector<Skin*>& skins, const Bindin
 
 bool applySkins(fbxsdk::FbxNode& node, fbxsdk::FbxMesh& mesh, const FbxTime& time, DeformedMesh& deformed) {
     const std::vector<Skin*> skins = skinsOf(mesh);
-    if (skins.empty()) {
+    if (skins.empty())
         return false;
-    }
     const Matrix geometric = geometricMatrix(node);
     Binding binding{node, geometric, worldMatrix(node, time) * geometric, time, false};
     int clusters = 0;

@@ -11,11 +11,9 @@ namespace {
 
 template <class Object>
 void addAll(WrittenScene& scene, bool wanted, const std::vector<Object*>& objects) {
-    for (Object* object : objects) {
-        if (wanted && object != nullptr) {
+    for (Object* object : objects)
+        if (wanted && object != nullptr)
             addObject(scene, *object);
-        }
-    }
 }
 
 bool save(WrittenScene& scene) {
@@ -34,18 +32,16 @@ bool writeObjects(const TnFbxWriteInfo& info, const std::vector<TnFbxCamera*>& c
                   const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                   const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) {
     WrittenScene scene;
-    if (!scene.begin(info)) {
+    if (!scene.begin(info))
         return false;
-    }
     addAll(scene, info.getWriteCameras(), cameras);
     addAll(scene, info.getWriteLights(), lights);
     addAll(scene, info.getWriteTransforms(), transforms);
     addAll(scene, info.getWriteNulls(), nulls);
     addAll(scene, info.getWriteMeshes(), meshes);
     scene.finish();
-    if (scene.keys().memory().exceeded()) {
+    if (scene.keys().memory().exceeded())
         return detail::fail(info.getFileName() + ": " + scene.keys().memory().describe("keys"));
-    }
     return save(scene);
 }
 

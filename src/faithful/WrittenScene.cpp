@@ -28,17 +28,15 @@ std::string inLowerCase(std::string text) {
 } // namespace
 
 WrittenScene::~WrittenScene() {
-    if (mManager != nullptr) {
+    if (mManager != nullptr)
         mManager->Destroy();
-    }
 }
 
 bool WrittenScene::begin(const TnFbxWriteInfo& info) {
     mInfo = &info;
     mManager = fbxsdk::FbxManager::Create();
-    if (mManager == nullptr) {
+    if (mManager == nullptr)
         return detail::fail("the FBX manager cannot be created");
-    }
     mScene = fbxsdk::FbxScene::Create(mManager, "");
     const std::string& name = info.getAnimationStackName();
     mStack = fbxsdk::FbxAnimStack::Create(mScene, name.empty() ? kStackWithoutName : name.c_str());
@@ -74,9 +72,8 @@ void WrittenScene::finish() {
 
 fbxsdk::FbxNode& WrittenScene::addNode(const std::string& name, fbxsdk::FbxNode* parent) {
     fbxsdk::FbxNode* node = fbxsdk::FbxNode::Create(mScene, name.c_str());
-    if (!mNodeNames.insert(name).second && mInfo->getCompatibilityVersion() == TnFbxWriteInfo::kFbxVersion2010) {
+    if (!mNodeNames.insert(name).second && mInfo->getCompatibilityVersion() == TnFbxWriteInfo::kFbxVersion2010)
         mWarnings.add(name, kNumbered);
-    }
     (parent != nullptr ? parent : mScene->GetRootNode())->AddChild(node);
     return *node;
 }
@@ -84,9 +81,8 @@ fbxsdk::FbxNode& WrittenScene::addNode(const std::string& name, fbxsdk::FbxNode*
 std::string WrittenScene::cacheNameFor(const std::string& mesh) {
     std::string name = mesh;
     int& number = mNextNumbers.try_emplace(mesh, 2).first->second;
-    while (!mCacheNames.insert(inLowerCase(detail::pointCacheName(name))).second) {
+    while (!mCacheNames.insert(inLowerCase(detail::pointCacheName(name))).second)
         name = mesh + ' ' + std::to_string(number++);
-    }
     return name;
 }
 

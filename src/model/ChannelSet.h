@@ -34,11 +34,9 @@ constexpr std::size_t indexOf(Enumeration channel) {
 /// True when row i of a table is the row of enumerator i.
 template <typename Enumeration, std::size_t kCount>
 constexpr bool inEnumeratorOrder(const ChannelRow<Enumeration> (&rows)[kCount]) {
-    for (std::size_t i = 0; i < kCount; ++i) {
-        if (indexOf(rows[i].channel) != i) {
+    for (std::size_t i = 0; i < kCount; ++i)
+        if (indexOf(rows[i].channel) != i)
             return false;
-        }
-    }
     return true;
 }
 
@@ -56,25 +54,21 @@ struct ChannelSet {
 
     /// Every channel at its default.
     static void init(Array& channels) {
-        for (std::size_t i = 0; i < kCount; ++i) {
+        for (std::size_t i = 0; i < kCount; ++i)
             channels[i].initChannel(kRows[i].defaultValue);
-        }
     }
 
     /// The same for channels as their constructor leaves them.
     static void initNew(Array& channels) {
-        for (std::size_t i = 0; i < kCount; ++i) {
-            if (kRows[i].defaultValue != TnFbxChannel::kDefaultChannelValue) {
+        for (std::size_t i = 0; i < kCount; ++i)
+            if (kRows[i].defaultValue != TnFbxChannel::kDefaultChannelValue)
                 channels[i].setValue(kRows[i].defaultValue);
-            }
-        }
     }
 
     // kept: 0 for every channel, whatever its default
     static void clear(Array& channels) {
-        for (TnFbxChannel& channel : channels) {
+        for (TnFbxChannel& channel : channels)
             channel.deleteChannel();
-        }
     }
 
     static TnFbxChannel* find(Array& channels, Channel channel) {

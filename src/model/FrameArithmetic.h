@@ -12,9 +12,8 @@ namespace Tarnell::Fbx::detail {
 /// Truncates toward zero. A value beyond the range of an int becomes the nearest int, NaN the lowest int.
 constexpr int truncateToInt(float value) {
     constexpr float kBeyondRange = 2147483648.0f; // 2^31, the first float above every int
-    if (!(value >= -kBeyondRange)) {
+    if (!(value >= -kBeyondRange))
         return std::numeric_limits<int>::min(); // also for NaN, which compares false with everything
-    }
     return value < kBeyondRange ? static_cast<int>(value) : std::numeric_limits<int>::max();
 }
 

@@ -51,9 +51,8 @@ float toDegrees(float radians) { return static_cast<float>(static_cast<double>(r
 
 Vector3 normalized(const Vector3& v) {
     const float length = std::sqrt(v.x * v.x + v.y * v.y + v.z * v.z);
-    if (length == 0.0f || std::isnan(length)) {
+    if (length == 0.0f || std::isnan(length))
         return v;
-    }
     return {v.x / length, v.y / length, v.z / length};
 }
 

@@ -19,9 +19,8 @@ void preferLargePages(void* memory, std::size_t size) {
     const auto address = reinterpret_cast<std::uintptr_t>(memory);
     const std::uintptr_t first = (address + largePage - 1) / largePage * largePage;
     const std::uintptr_t end = (address + size) / largePage * largePage;
-    if (first < end) {
+    if (first < end)
         ::madvise(static_cast<char*>(memory) + (first - address), end - first, MADV_HUGEPAGE);
-    }
 }
 
 template <typename Element>
@@ -34,15 +33,13 @@ void reserveExactly(SharedArray<Element>& array, std::size_t count) {
 } // namespace
 
 MeshArrays::~MeshArrays() {
-    if (mAllocated) {
+    if (mAllocated)
         complete();
-    }
 }
 
 std::uint64_t MeshArrays::bytesOf(std::int64_t polygons, std::int64_t controlPoints, std::int64_t polygonVertices) {
-    if (polygons < 1 || controlPoints < 1 || polygonVertices < 1) {
+    if (polygons < 1 || controlPoints < 1 || polygonVertices < 1)
         return 0;
-    }
     constexpr std::size_t corner =
         sizeof(int) + sizeof(TnFbxMesh::Vector) + sizeof(TnFbxMesh::TextureCoordinate) + sizeof(TnFbxMesh::Colour);
     return static_cast<std::uint64_t>(polygons) * sizeof(int) +
@@ -51,9 +48,8 @@ std::uint64_t MeshArrays::bytesOf(std::int64_t polygons, std::int64_t controlPoi
 }
 
 std::uint64_t MeshArrays::bytesOfAnother(std::int64_t controlPoints, std::int64_t polygonVertices) {
-    if (controlPoints < 1 || polygonVertices < 1) {
+    if (controlPoints < 1 || polygonVertices < 1)
         return 0;
-    }
     constexpr std::size_t corner = sizeof(TnFbxMesh::Vector) + sizeof(TnFbxMesh::Colour);
     return static_cast<std::uint64_t>(controlPoints) * sizeof(TnFbxMesh::Vector) +
            static_cast<std::uint64_t>(polygonVertices) * corner;
@@ -75,9 +71,8 @@ MeshArrays::Identity MeshArrays::identityOf(const TnFbxMesh& mesh) {
 
 bool MeshArrays::allocate(int polygons, int controlPoints, int polygonVertices) {
     mMesh.initMesh(); // kept: before the check, so that a failure leaves an empty mesh
-    if (polygons < 1 || controlPoints < 1 || polygonVertices < 1) {
+    if (polygons < 1 || controlPoints < 1 || polygonVertices < 1)
         return false;
-    }
     const auto polygonCount = static_cast<std::size_t>(polygons);
     const auto cornerCount = static_cast<std::size_t>(polygonVertices);
     TnFbxMesh::Geometry& g = mMesh.mGeometry;

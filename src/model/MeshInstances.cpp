@@ -10,9 +10,8 @@ namespace {
 template <class Pool, class Element>
 std::uint64_t shareEqual(Pool& pool, SharedArray<Element>& array) {
     const auto [equal, isNew] = pool.insert(array);
-    if (isNew || equal->identity() == array.identity()) {
+    if (isNew || equal->identity() == array.identity())
         return 0;
-    }
     array = *equal;
     return array.size() * sizeof(Element);
 }
@@ -29,9 +28,8 @@ std::uint64_t MeshInstances::keep(const Source& source, TnFbxMesh& mesh) {
     const std::uint64_t freed = shareEqual(mVectors, geometry.controlPoints) + shareEqual(mVectors, geometry.normals) +
                                 shareEqual(mColours, geometry.colours);
     Kept& kept = mSources[source];
-    if (!kept.isFilled) {
+    if (!kept.isFilled)
         kept = {true, geometry};
-    }
     return freed;
 }
 

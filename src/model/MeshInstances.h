@@ -52,9 +52,8 @@ private:
             const auto extent = [](const auto& array) {
                 return std::tuple(array.size(), array.storedCount(), array.filler() != nullptr);
             };
-            if (extent(left) != extent(right)) {
+            if (extent(left) != extent(right))
                 return extent(left) < extent(right);
-            }
             const auto order = [](const Element* a, const Element* b, std::size_t count) {
                 return a != nullptr && b != nullptr ? std::memcmp(a, b, count * sizeof(Element)) : 0;
             };

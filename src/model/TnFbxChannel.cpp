@@ -30,9 +30,8 @@ constexpr float kFirstInexactFrame = 16777216.0f;
 float clampToRange(float frame, const TnFbxTime& time) {
     const float start = static_cast<float>(time.getStartFrame());
     const float end = static_cast<float>(time.getEndFrame());
-    if (start > frame) {
+    if (start > frame)
         return start;
-    }
     return frame > end ? end : frame;
 }
 
@@ -103,9 +102,8 @@ bool TnFbxChannel::setValueAt(float frame, float value) {
         mAnimated = true;
         return true;
     }
-    if (countToCover(wholeFrame) > mValues.size() + kMostAddedSamples) {
+    if (countToCover(wholeFrame) > mValues.size() + kMostAddedSamples)
         return false;
-    }
     spread();
     coverFrame(wholeFrame);
     mValues[indexOf(wholeFrame)] = value;
@@ -119,22 +117,19 @@ std::size_t TnFbxChannel::indexOf(int frame) const {
 
 /// How many samples there are once the range includes the frame.
 std::size_t TnFbxChannel::countToCover(int frame) const {
-    if (mCount == 0) {
+    if (mCount == 0)
         return 1;
-    }
     const int start = mTime.getStartFrame();
     const int end = mTime.getEndFrame();
-    if (frame < start) {
+    if (frame < start)
         return mCount + static_cast<std::size_t>(std::int64_t{start} - frame);
-    }
     return frame > end ? static_cast<std::size_t>(detail::frameCount(start, frame)) : mCount;
 }
 
 /// Stores every sample separately.
 void TnFbxChannel::spread() {
-    if (mValues.size() < mCount) {
+    if (mValues.size() < mCount)
         mValues.resize(mCount, mValues.front());
-    }
 }
 
 // Widens the range to include a frame:
@@ -164,22 +159,19 @@ void TnFbxChannel::coverFrame(int frame) {
 }
 
 bool TnFbxChannel::setAnimatedValues(TnFbxTime time, const std::vector<float>& values) {
-    if (!areSamples(time, values.size())) {
+    if (!areSamples(time, values.size()))
         return false;
-    }
-    if (areAllEqual(values)) {
+    if (areAllEqual(values))
         mValues.assign(1, values.front());
-    } else {
+    else
         mValues = values;
-    }
     takeOver(time, values.size());
     return true;
 }
 
 bool TnFbxChannel::moveAnimatedValues(TnFbxTime time, std::vector<float>&& values) {
-    if (!areSamples(time, values.size())) {
+    if (!areSamples(time, values.size()))
         return false;
-    }
     const std::size_t count = values.size();
     mValues = areAllEqual(values) ? std::vector<float>(1, values.front()) : std::move(values);
     takeOver(time, count);
@@ -187,9 +179,8 @@ bool TnFbxChannel::moveAnimatedValues(TnFbxTime time, std::vector<float>&& value
 }
 
 bool TnFbxChannel::setConstantValues(TnFbxTime time, float value) {
-    if (!isRange(time)) {
+    if (!isRange(time))
         return false;
-    }
     mValues = std::vector<float>(1, value);
     takeOver(time, framesOf(time));
     return true;
@@ -203,29 +194,25 @@ void TnFbxChannel::takeOver(const TnFbxTime& time, std::size_t count) {
 
 // The animated flag has no effect here: a channel without samples counts as static.
 float TnFbxChannel::getAnimatedValue(float frame) const {
-    if (mValues.empty() || std::isnan(frame)) { // NaN is a frame outside every range
+    if (mValues.empty() || std::isnan(frame)) // NaN is a frame outside every range
         return mValue;
-    }
     const auto count = static_cast<std::int64_t>(mCount);
     if (std::fabs(frame) < kFirstInexactFrame) { // most requests are for a whole frame of the range
         const int exact = static_cast<int>(frame);
         const std::int64_t index = std::int64_t{exact} - mTime.getStartFrame();
-        if (static_cast<float>(exact) == frame && index >= 0 && index < count && exact <= mTime.getEndFrame()) {
+        if (static_cast<float>(exact) == frame && index >= 0 && index < count && exact <= mTime.getEndFrame())
             return sampleAt(static_cast<std::size_t>(index));
-        }
     }
     const float clamped = clampToRange(frame, mTime);
     const int whole = detail::truncateToInt(clamped); // kept: toward zero, so frame −4.5 starts from −4
     const std::int64_t index = std::int64_t{whole} - mTime.getStartFrame();
-    if (index < 0 || index >= count) {
+    if (index < 0 || index >= count)
         return mValue; // beyond 2^24 the float of the last frame can lie after the frame itself
-    }
 
     const float sample = sampleAt(static_cast<std::size_t>(index));
     const float wholeFrame = static_cast<float>(whole);
-    if (std::fabs(wholeFrame - clamped) < kExactFrameTolerance || index + 1 >= count) {
+    if (std::fabs(wholeFrame - clamped) < kExactFrameTolerance || index + 1 >= count)
         return sample;
-    }
     const float next = sampleAt(static_cast<std::size_t>(index + 1));
     return sample + (clamped - wholeFrame) * (next - sample);
 }

@@ -27,9 +27,8 @@ const Element* elementAt(const SharedArray<Element>& array, int index) {
 
 template <typename Element>
 bool setElement(SharedArray<Element>& array, int index, const Element& value) {
-    if (index < 0 || index >= lengthOf(array)) {
+    if (index < 0 || index >= lengthOf(array))
         return false;
-    }
     array.own()[static_cast<std::size_t>(index)] = value;
     return true;
 }
@@ -37,9 +36,8 @@ bool setElement(SharedArray<Element>& array, int index, const Element& value) {
 template <typename Vector>
 bool getVector(const SharedArray<Vector>& array, int index, float& x, float& y, float& z) {
     const Vector* vector = elementAt(array, index);
-    if (vector == nullptr) {
+    if (vector == nullptr)
         return false;
-    }
     x = vector->x;
     y = vector->y;
     z = vector->z;
@@ -133,9 +131,8 @@ bool TnFbxMesh::getNormal(int polygonVertex, float& x, float& y, float& z) const
 
 bool TnFbxMesh::getUV(int polygonVertex, float& u, float& v) const {
     const TextureCoordinate* uv = elementAt(mGeometry.uvs, polygonVertex);
-    if (uv == nullptr) {
+    if (uv == nullptr)
         return false;
-    }
     u = uv->u;
     v = uv->v;
     return true;
@@ -143,9 +140,8 @@ bool TnFbxMesh::getUV(int polygonVertex, float& u, float& v) const {
 
 bool TnFbxMesh::getColour(int polygonVertex, float& red, float& green, float& blue, float& alpha) const {
     const Colour* colour = elementAt(mGeometry.colours, polygonVertex);
-    if (colour == nullptr) {
+    if (colour == nullptr)
         return false;
-    }
     red = colour->red;
     green = colour->green;
     blue = colour->blue;

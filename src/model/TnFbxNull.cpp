@@ -12,9 +12,8 @@ TnFbxNull::~TnFbxNull() = default;
 
 // kept: nothing of the transform is copied, nor the name
 TnFbxNull& TnFbxNull::operator=(const TnFbxNull& other) {
-    if (this != &other) {
+    if (this != &other)
         mProperties = other.mProperties;
-    }
     return *this;
 }
 

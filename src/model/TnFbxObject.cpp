@@ -9,9 +9,8 @@ TnFbxObject::TnFbxObject() = default;
 TnFbxObject::~TnFbxObject() = default;
 
 TnFbxObject& TnFbxObject::operator=(const TnFbxObject& other) {
-    if (this != &other) {
+    if (this != &other)
         mName = other.mName;
-    }
     return *this;
 }
 

@@ -9,9 +9,8 @@ TnFbxReadInfo::TnFbxReadInfo() { initReadInfo(); }
 TnFbxReadInfo::~TnFbxReadInfo() = default;
 
 TnFbxReadInfo& TnFbxReadInfo::operator=(const TnFbxReadInfo& other) {
-    if (this != &other) {
+    if (this != &other)
         mOptions = other.mOptions;
-    }
     return *this;
 }
 

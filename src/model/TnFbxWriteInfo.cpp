@@ -10,9 +10,8 @@ TnFbxWriteInfo::~TnFbxWriteInfo() = default;
 
 // kept: the compatibility version is not copied
 TnFbxWriteInfo& TnFbxWriteInfo::operator=(const TnFbxWriteInfo& other) {
-    if (this != &other) {
+    if (this != &other)
         mOptions = other.mOptions;
-    }
     return *this;
 }
 

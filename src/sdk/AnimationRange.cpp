@@ -46,9 +46,8 @@ bool widenByChannels(fbxsdk::FbxCache& cache, float& start, float& end) {
 
 bool FbxSdk::getAnimationFrameRange(float& start, float& end) {
     fbxsdk::FbxNode* root = mScene != nullptr ? mScene->GetRootNode() : nullptr;
-    if (root == nullptr) {
+    if (root == nullptr)
         return fail("the scene has no root node");
-    }
     fbxsdk::FbxTimeSpan span(fbxsdk::FBXSDK_TIME_INFINITE, fbxsdk::FBXSDK_TIME_MINUS_INFINITE);
     if (root->GetAnimationInterval(span, /*pAnimStack: the current one*/ nullptr, /*pAnimLayerId*/ 0)) {
         start = detail::toFloat(span.GetStart().GetSecondDouble()); // kept: seconds, although the name says frames
@@ -67,9 +66,8 @@ bool FbxSdk::getAnimationFrameRangeRecursive(fbxsdk::FbxNode* node, float& start
     detail::walkNodes(node, [&](fbxsdk::FbxNode& visited) {
         fbxsdk::FbxMesh* mesh = visited.GetMesh();
         if (mesh != nullptr && getDeformation(mesh)) {
-            if (fbxsdk::FbxCache* cache = mayaCacheOf(*mesh)) {
+            if (fbxsdk::FbxCache* cache = mayaCacheOf(*mesh))
                 found = widenByChannels(*cache, start, end) || found;
-            }
         }
         return true;
     });

@@ -15,12 +15,10 @@ namespace Tarnell::Fbx::detail {
 /// applies it k times; and a weight that equals a full weight selects nothing. The last step has no weight to compare
 /// with above its own.
 inline std::optional<int> targetOfStep(int step, double weight, const double* fullWeights, int targetCount) {
-    if (step + 1 < targetCount && fullWeights[step] < weight && weight < fullWeights[step + 1]) {
+    if (step + 1 < targetCount && fullWeights[step] < weight && weight < fullWeights[step + 1])
         return step + 1;
-    }
-    if (weight > 0.0 && weight < fullWeights[0]) {
+    if (weight > 0.0 && weight < fullWeights[0])
         return 0;
-    }
     return std::nullopt;
 }
 

@@ -29,9 +29,8 @@ using Vector = fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>;
 /// The static values of a vector into three consecutive channels.
 void setVector(TnFbxCamera& camera, TnFbxCamera::EFbxCameraChannelType firstChannel, const Vector& property) {
     const fbxsdk::FbxDouble3 value = property.Get();
-    for (int i = 0; i < 3; ++i) {
+    for (int i = 0; i < 3; ++i)
         camera.setValue(channelAfter(firstChannel, i), toFloat(value[i]));
-    }
 }
 
 void setRotation(TnFbxCamera& camera, float x, float y, float z) {
@@ -78,9 +77,8 @@ void setProjection(TnFbxCamera& camera, const Camera& source) {
 
 /// kept: an angle that drives the lens becomes a sampled focal length; its static value is not converted
 void readFieldOfViewAsFocalLength(PropertySampler& properties, const Camera& source, TnFbxCamera& camera) {
-    if (!properties.sample(source.FieldOfView, nullptr)) {
+    if (!properties.sample(source.FieldOfView, nullptr))
         return;
-    }
     properties.samples().transform(
         [&source](float angle) { return toFloat(source.ComputeFocalLength(static_cast<double>(angle))); });
     properties.samples().moveInto(*camera.getCameraChannel(TnFbxCamera::kFbxCameraFocalLength), properties.time());
@@ -140,12 +138,10 @@ struct LookAtRange {
 
 LookAtRange lookAtRange(FbxSdk& sdk, TnFbxCamera& camera) {
     LookAtRange range;
-    for (int i = 0; i < 3; ++i) {
+    for (int i = 0; i < 3; ++i)
         range.include(sdk, *camera.getTransformChannel(channelAfter(TnFbxTransform::kFbxTransformPositionX, i)));
-    }
-    for (int i = TnFbxCamera::kFbxCameraLookAtPositionX; i <= TnFbxCamera::kFbxCameraRoll; ++i) {
+    for (int i = TnFbxCamera::kFbxCameraLookAtPositionX; i <= TnFbxCamera::kFbxCameraRoll; ++i)
         range.include(sdk, *camera.getCameraChannel(static_cast<TnFbxCamera::EFbxCameraChannelType>(i)));
-    }
     return range;
 }
 
@@ -154,9 +150,8 @@ LookAtRange lookAtRange(FbxSdk& sdk, TnFbxCamera& camera) {
 bool FbxSdk::getCamera(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, bool useInterestPosition,
                        fbxsdk::FbxNode* node, TnFbxCamera& camera, fbxsdk::FbxAMatrix& geometric) {
     auto* source = fbxsdk::FbxCast<Camera>(node != nullptr ? node->GetNodeAttribute() : nullptr);
-    if (source == nullptr) {
+    if (source == nullptr)
         return fail("no node with a camera to read");
-    }
     const detail::ReadScope scope(*this);
     PropertySampler properties = sampler(time, useSampleFPS, sampleFPS);
     camera.setName(node->GetName());
@@ -170,11 +165,10 @@ bool FbxSdk::getCamera(TnFbxTime& time, bool global, bool useSampleFPS, float sa
     properties.readInto(camera, TnFbxCamera::kFbxCameraRoll, source->Roll);
     setVector(camera, TnFbxCamera::kFbxCameraUpPositionX, source->UpVector);
 
-    if (looksAt) {
+    if (looksAt)
         setLookAtRotation(camera);
-    } else {
+    else
         properties.readIntoTransform(camera, TnFbxTransform::kFbxTransformRotationX, node->LclRotation);
-    }
     properties.readIntoTransform(camera, TnFbxTransform::kFbxTransformScaleX, node->LclScaling);
     camera.setTransformRotationOrder(looksAt ? TnFbxTransform::kFbxRotationOrderZXY : rotationOrderOf(*this, *node));
     camera.setTransformTransformOrder(TnFbxTransform::kFbxTransformOrderDefault);
@@ -191,16 +185,14 @@ bool FbxSdk::getCamera(TnFbxTime& time, bool global, bool useSampleFPS, float sa
 bool FbxSdk::getTargetLookAt(TnFbxTime& time, bool global, fbxsdk::FbxNode& node, TnFbxCamera& camera,
                              fbxsdk::FbxAMatrix& geometric, PropertySampler& properties) {
     fbxsdk::FbxNode* target = node.GetTarget();
-    if (target == nullptr) {
+    if (target == nullptr)
         return false;
-    }
     if (!global) { // kept: the camera's own translation curves, not the target's, and no static values
         properties.sampleVectorInto(camera, TnFbxCamera::kFbxCameraLookAtPositionX, node.LclTranslation);
         return true;
     }
-    if (time.getStartFrame() > time.getEndFrame()) {
+    if (time.getStartFrame() > time.getEndFrame())
         return true;
-    }
     detail::GlobalSampler globals(*this, time);
     globals.add(*target, geometric);
     globals.sample(*mSamples);
@@ -225,23 +217,20 @@ void FbxSdk::setLookAtRotation(TnFbxCamera& camera) {
 
     const std::int64_t count = detail::frameCount(range.start, range.end);
     std::array<detail::SampleRun, 3> angles;
-    for (detail::SampleRun& angle : angles) {
+    for (detail::SampleRun& angle : angles)
         angle.begin(static_cast<std::size_t>(count));
-    }
     for (std::int64_t i = 0; i < (range.isConstant ? 1 : count); ++i) {
         std::array<float, 3> at{};
         camera.calculateCameraRotationAt(at[0], at[1], at[2], static_cast<float>(range.start + i));
-        for (std::size_t axis = 0; axis < angles.size(); ++axis) {
+        for (std::size_t axis = 0; axis < angles.size(); ++axis)
             angles[axis].add(at[axis]);
-        }
     }
     TnFbxTime time;
     time.setTime(0.0f, range.start, range.end, range.rate);
     for (int axis = 0; axis < 3; ++axis) {
         detail::SampleRun& angle = angles[static_cast<std::size_t>(axis)];
-        if (range.isConstant) {
+        if (range.isConstant)
             angle.setConstant(angle.first());
-        }
         TnFbxChannel* channel = camera.getTransformChannel(channelAfter(TnFbxTransform::kFbxTransformRotationX, axis));
         angle.moveInto(*channel, time);
     }
@@ -255,22 +244,19 @@ void FbxSdk::getCameraFrameRange(TnFbxTime time, bool& found, float& frameRate, 
 }
 
 bool FbxSdk::getProducerCamera(fbxsdk::FbxNode* node, fbxsdk::FbxCamera* camera, TnFbxCamera& out, const char* name) {
-    if (camera == nullptr) {
+    if (camera == nullptr)
         return fail("no producer camera to read");
-    }
     out.setName(name != nullptr ? name : "");
     const fbxsdk::FbxDouble3 position = camera->Position.Get();
-    for (int i = 0; i < 3; ++i) {
+    for (int i = 0; i < 3; ++i)
         out.setTransformValue(channelAfter(TnFbxTransform::kFbxTransformPositionX, i), toFloat(position[i]));
-    }
     setVector(out, TnFbxCamera::kFbxCameraUpPositionX, camera->UpVector);
     setVector(out, TnFbxCamera::kFbxCameraLookAtPositionX, camera->InterestPosition);
     out.setValue(TnFbxCamera::kFbxCameraRoll, toFloat(camera->Roll.Get()));
 
     setStaticLookAtRotation(out);
-    for (int i = 0; i < 3; ++i) {
+    for (int i = 0; i < 3; ++i)
         out.setTransformValue(channelAfter(TnFbxTransform::kFbxTransformScaleX, i), 1.0f);
-    }
     out.setTransformRotationOrder(node != nullptr ? rotationOrderOf(*this, *node)
                                                   : TnFbxTransform::kFbxRotationOrderZXY);
     out.setTransformTransformOrder(TnFbxTransform::kFbxTransformOrderDefault);

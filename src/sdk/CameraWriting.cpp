@@ -89,12 +89,10 @@ void writeFilmOffset(ChannelWriter& writer, TnFbxCamera& source, Camera& camera)
 // kept: look-at, up vector and roll are not written; the camera's rotation defines its direction
 bool FbxSdk::setCameraCurveValues(fbxsdk::FbxNode* node, TnFbxCamera* camera) {
     Camera* target = node != nullptr ? node->GetCamera() : nullptr;
-    if (target == nullptr || camera == nullptr) {
+    if (target == nullptr || camera == nullptr)
         return fail("no node with a camera, or no camera to write");
-    }
-    if (!setTransformCurveValues(node, camera)) {
+    if (!setTransformCurveValues(node, camera))
         return false;
-    }
     ChannelWriter writer(currentLayer(), *mFrameTimes, *mMemory);
     writeFilmSize(writer, *camera, *target);
     writer.write(target->NearPlane, camera->getCameraChannel(TnFbxCamera::kFbxCameraNearPlane));

@@ -38,9 +38,8 @@ bool mayAddKeys(const TnFbxTime& range, detail::MemoryAccount& memory) {
 /// Linear keys; another platform than ours is given each.
 void addLinearKeys(fbxsdk::FbxAnimCurve& curve, std::span<const fbxsdk::FbxTime> times, const float* values) {
 #ifdef TARNELL_FBX_EXTERNAL_FBXSDK
-    for (const fbxsdk::FbxTime& time : times) {
+    for (const fbxsdk::FbxTime& time : times)
         curve.KeySet(curve.KeyAdd(time), time, *values++, fbxsdk::FbxAnimCurveDef::eInterpolationLinear);
-    }
 #else
     fbxsdk::extensions::addLinearKeys(curve, times.data(), values, static_cast<int>(times.size()));
 #endif
@@ -79,9 +78,8 @@ constexpr LocalRow kLocalRows[] = {
 
 fbxsdk::FbxDouble3 staticValues(const TnFbxTransform& transform, TnFbxTransform::EFbxTransformChannelType first) {
     fbxsdk::FbxDouble3 values;
-    for (int i = 0; i < 3; ++i) {
+    for (int i = 0; i < 3; ++i)
         values[i] = static_cast<double>(transform.getTransformValue(channelAfter(first, i)));
-    }
     return values;
 }
 
@@ -89,14 +87,12 @@ fbxsdk::FbxDouble3 staticValues(const TnFbxTransform& transform, TnFbxTransform:
 
 bool detail::writeCurve(fbxsdk::FbxAnimCurve* curve, const TnFbxChannel* channel, float scale, FrameTimes& times,
                         MemoryAccount& memory) {
-    if (curve == nullptr || channel == nullptr) {
+    if (curve == nullptr || channel == nullptr)
         return fail("no curve or no channel to write");
-    }
     curve->SetValue(channel->getValue(), /*pCurveNodeIndex*/ 0); // kept: not scaled, although the keys are
     if (channel->getAnimated()) {
-        if (!mayAddKeys(channel->getTime(), memory)) {
+        if (!mayAddKeys(channel->getTime(), memory))
             return fail(memory.describe("keys"));
-        }
         curve->KeyModifyBegin();
         addKeys(*curve, *channel, scale, times);
         curve->KeyModifyEnd();
@@ -115,12 +111,10 @@ fbxsdk::FbxAnimLayer* FbxSdk::currentLayer() const {
 
 // kept: skew and pivot are not written
 bool FbxSdk::setTransformCurveValues(fbxsdk::FbxNode* node, TnFbxTransform* transform) {
-    if (node == nullptr || transform == nullptr) {
+    if (node == nullptr || transform == nullptr)
         return fail("no node or no transform to write");
-    }
-    for (const LocalRow& row : kLocalRows) {
+    for (const LocalRow& row : kLocalRows)
         (node->*row.property).Set(staticValues(*transform, row.firstChannel));
-    }
     ChannelWriter writer(currentLayer(), *mFrameTimes, *mMemory);
     for (const LocalRow& row : kLocalRows) {
         for (int i = 0; i < 3; ++i) {
@@ -135,12 +129,10 @@ bool FbxSdk::setTransformCurveValues(fbxsdk::FbxNode* node, TnFbxTransform* tran
 
 bool FbxSdk::setNullCurveValues(fbxsdk::FbxNode* node, TnFbxNull* null) {
     fbxsdk::FbxNull* target = node != nullptr ? node->GetNull() : nullptr;
-    if (target == nullptr || null == nullptr) {
+    if (target == nullptr || null == nullptr)
         return fail("no node with a null, or no null to write");
-    }
-    if (!setTransformCurveValues(node, null)) {
+    if (!setTransformCurveValues(node, null))
         return false;
-    }
     switch (null->getNullLookType()) {
     case TnFbxNull::kFbxNullLookNone:
         target->Look.Set(fbxsdk::FbxNull::eNone);

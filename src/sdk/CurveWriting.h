@@ -26,9 +26,8 @@ public:
     /// The curve of one component of a property, or of a scalar property when `component` is null. A property
     /// that holds no number has none.
     void key(fbxsdk::FbxProperty property, const char* component, TnFbxChannel* channel, float scale = 1.0f) {
-        if (fbxsdk::FbxAnimCurve* curve = property.GetCurve(mLayer, property.GetName(), component, true)) {
+        if (fbxsdk::FbxAnimCurve* curve = property.GetCurve(mLayer, property.GetName(), component, true))
             writeCurve(curve, channel, scale, mTimes, mMemory);
-        }
     }
 
     /// Value and curve of a scalar property; no effect without a channel.

@@ -28,9 +28,8 @@ void createExportSettings(fbxsdk::FbxManager* manager, bool embedMedia) {
         {"Export|AdvOptGrp|Fbx|Global_Settings", true}, //
     };
     fbxsdk::FbxIOSettings* settings = fbxsdk::FbxIOSettings::Create(manager, "IOSRoot");
-    for (const auto& [path, value] : values) {
+    for (const auto& [path, value] : values)
         settings->SetBoolProp(path, value);
-    }
 }
 
 } // namespace
@@ -45,9 +44,8 @@ bool FbxSdk::saveScene(const TnFbxWriteInfo& info) {
 
 bool FbxSdk::saveScene(fbxsdk::FbxManager* manager, fbxsdk::FbxDocument* document, const std::string& fileName,
                        bool asciiFormat, TnFbxWriteInfo::eCompatibilityVersion version, bool embedMedia) {
-    if (manager == nullptr) {
+    if (manager == nullptr)
         return fail(fileName + ": the FBX manager is not initialised");
-    }
     fbxsdk::FbxExporter* exporter = fbxsdk::FbxExporter::Create(manager, "");
     exporter->SetFileExportVersion(detail::versionString(version), fbxsdk::FbxSceneRenamer::eNone);
 
@@ -55,9 +53,8 @@ bool FbxSdk::saveScene(fbxsdk::FbxManager* manager, fbxsdk::FbxDocument* documen
     // kept: with embedded media the native writer, also when ASCII is requested
     const int format =
         embedMedia ? registry.GetNativeWriterFormat() : detail::findWriter(registry, asciiFormat ? "ascii" : "binary");
-    if (registry.WriterIsFBX(format)) {
+    if (registry.WriterIsFBX(format))
         createExportSettings(manager, embedMedia);
-    }
     return detail::exportDocument(*exporter, document, fileName, format);
 }
 

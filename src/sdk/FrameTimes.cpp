@@ -12,9 +12,8 @@ constexpr std::size_t kMostKeptTimes = std::size_t{1} << 16;
 } // namespace
 
 void detail::FrameTimes::begin(std::int64_t firstFrame, float rate) {
-    if (mFirstFrame != firstFrame || mRate != rate) {
+    if (mFirstFrame != firstFrame || mRate != rate)
         mTimes.clear();
-    }
     mFirstFrame = firstFrame;
     mRate = rate;
 }
@@ -22,9 +21,8 @@ void detail::FrameTimes::begin(std::int64_t firstFrame, float rate) {
 fbxsdk::FbxTime detail::FrameTimes::timeOf(std::int64_t frame) {
     fbxsdk::FbxTime time;
     time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(mRate));
-    if (mTimes.size() < kMostKeptTimes) {
+    if (mTimes.size() < kMostKeptTimes)
         mTimes.push_back(time);
-    }
     return time;
 }
 

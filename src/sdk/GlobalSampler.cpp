@@ -22,9 +22,8 @@ namespace {
 /// Directional and spot lights shine along an axis of their own that is not the node's.
 bool shinesAlongAnAxis(fbxsdk::FbxNode& node) {
     auto* light = fbxsdk::FbxCast<fbxsdk::FbxLight>(node.GetNodeAttribute());
-    if (light == nullptr) {
+    if (light == nullptr)
         return false;
-    }
     const int type = detail::enumNumber(light->LightType);
     return type == fbxsdk::FbxLight::eDirectional || type == fbxsdk::FbxLight::eSpot;
 }
@@ -64,26 +63,23 @@ public:
             mHasLast = true;
             turnAndScale(matrix);
         }
-        for (int i = 0; i < 3; ++i) {
+        for (int i = 0; i < 3; ++i)
             mPlacement[static_cast<std::size_t>(i)] = toFloat(t[i]);
-        }
         return mPlacement;
     }
 
 private:
     void turnAndScale(const fbxsdk::FbxAMatrix& matrix) {
-        if (mAtOrigin) {
+        if (mAtOrigin)
             mSdk.extractMatrixRotation(matrix, mPlacement[3], mPlacement[4], mPlacement[5]);
-        } else {
+        else
             store(matrix.GetR(), 3);
-        }
         store(matrix.GetS(), 6);
     }
 
     void store(const fbxsdk::FbxVector4& vector, std::size_t firstChannel) {
-        for (int i = 0; i < 3; ++i) {
+        for (int i = 0; i < 3; ++i)
             mPlacement[firstChannel + static_cast<std::size_t>(i)] = toFloat(vector[i]);
-        }
     }
 
     FbxSdk& mSdk;
@@ -159,9 +155,8 @@ bool GlobalSampler::begin(MovingNode& node, SampleAccount& account) const {
         node.runs[i].begin(static_cast<std::size_t>(frameCount(mFrames.first, mFrames.last)));
         node.runs[i].add(first[i]);
     }
-    if (account.take(mFrames, mRate, /*channelCount*/ 1)) {
+    if (account.take(mFrames, mRate, /*channelCount*/ 1))
         return true;
-    }
     account.take(mFrames, mRate, node.runs.size() - 1); // how many will change is not known: at most
     return false;
 }
@@ -189,25 +184,20 @@ bool GlobalSampler::goOn(MovingNode& node, std::span<const fbxsdk::FbxTime> time
         const std::size_t count = std::min(matrices.size(), times.size());
         globalTransforms(node.node, times.first(count), matrices.data());
         times = times.subspan(count);
-        for (std::size_t i = 0; i < count; ++i) {
-            if (!add(node, matrices[i], account)) {
+        for (std::size_t i = 0; i < count; ++i)
+            if (!add(node, matrices[i], account))
                 return false;
-            }
-        }
     }
     return true;
 }
 
 void GlobalSampler::sample(SampleAccount& account) {
     std::vector<MovingNode*> moving;
-    for (const SampledNode& node : mNodes) {
-        if (node.moving && begin(*node.moving, account)) {
+    for (const SampledNode& node : mNodes)
+        if (node.moving && begin(*node.moving, account))
             moving.push_back(node.moving.get());
-        }
-    }
-    if (account.exceeded()) {
+    if (account.exceeded())
         return;
-    }
 
     // Only the transforms of a branch over one portion of the frames have to be cached.
     constexpr std::int64_t kMostRemembered = 1 << 15;
@@ -216,26 +206,20 @@ void GlobalSampler::sample(SampleAccount& account) {
     std::vector<fbxsdk::FbxTime> times;
     for (std::int64_t next = std::int64_t{mFrames.first} + 1; next <= mFrames.last && !moving.empty();) {
         times.clear();
-        for (const std::int64_t end = next + portion; next < end && next <= mFrames.last; ++next) {
+        for (const std::int64_t end = next + portion; next < end && next <= mFrames.last; ++next)
             times.push_back(timeOf(next));
-        }
-        for (MovingNode* node : moving) {
-            if (!goOn(*node, times, account)) {
+        for (MovingNode* node : moving)
+            if (!goOn(*node, times, account))
                 return;
-            }
-        }
     }
-    for (const MovingNode* node : moving) {
-        if (node->spreadCount == 0) {
+    for (const MovingNode* node : moving)
+        if (node->spreadCount == 0)
             account.giveBack(mFrames);
-        }
-    }
 }
 
 GlobalRuns* GlobalSampler::take(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& geometric) {
-    if (mNext >= mNodes.size() || mNodes[mNext].node != &node) {
+    if (mNext >= mNodes.size() || mNodes[mNext].node != &node)
         return nullptr;
-    }
     mTaken = std::move(mNodes[mNext++].moving);
     if (!mTaken) {
         mTaken = std::make_unique<MovingNode>(mSdk, node, geometric);

@@ -28,9 +28,8 @@ template <class Object, class Channel>
 void readColour(PropertySampler& properties, Object& object, Channel red,
                 const fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property) {
     const fbxsdk::FbxDouble3 colour = property.Get();
-    for (int i = 0; i < 3; ++i) {
+    for (int i = 0; i < 3; ++i)
         object.setValue(channelAfter(red, i), toFloat(colour[i]));
-    }
     object.setValue(channelAfter(red, 3), 1.0f); // kept: always opaque
     properties.sampleVectorInto(object, red, property);
 }
@@ -50,14 +49,12 @@ void readIntensity(PropertySampler& properties, TnFbxLight& light, const Light& 
 bool FbxSdk::getLight(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                       TnFbxLight& light, fbxsdk::FbxAMatrix& geometric) {
     auto* source = fbxsdk::FbxCast<Light>(node != nullptr ? node->GetNodeAttribute() : nullptr);
-    if (source == nullptr) {
+    if (source == nullptr)
         return fail("no node with a light to read");
-    }
     const detail::ReadScope scope(*this);
     light.setName(node->GetName());
-    if (!getTransform(time, global, useSampleFPS, sampleFPS, node, light, geometric)) {
+    if (!getTransform(time, global, useSampleFPS, sampleFPS, node, light, geometric))
         return false;
-    }
     PropertySampler properties = sampler(time, useSampleFPS, sampleFPS);
     readColour(properties, light, TnFbxLight::kFbxLightRed, source->Color);
     readIntensity(properties, light, *source);
@@ -70,14 +67,12 @@ bool FbxSdk::getLight(TnFbxTime& time, bool global, bool useSampleFPS, float sam
 bool FbxSdk::getMarker(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                        TnFbxMarker& marker, fbxsdk::FbxAMatrix& geometric) {
     auto* source = fbxsdk::FbxCast<Marker>(node != nullptr ? node->GetNodeAttribute() : nullptr);
-    if (source == nullptr) {
+    if (source == nullptr)
         return fail("no node with a marker to read");
-    }
     const detail::ReadScope scope(*this);
     marker.setName(node->GetName());
-    if (!getTransform(time, global, useSampleFPS, sampleFPS, node, marker, geometric)) {
+    if (!getTransform(time, global, useSampleFPS, sampleFPS, node, marker, geometric))
         return false;
-    }
     PropertySampler properties = sampler(time, useSampleFPS, sampleFPS);
     readColour(properties, marker, TnFbxMarker::kFbxMarkerRed, source->Color);
     marker.setMarkerSize(toFloat(source->Size.Get()));
@@ -87,18 +82,15 @@ bool FbxSdk::getMarker(TnFbxTime& time, bool global, bool useSampleFPS, float sa
 
 bool FbxSdk::getNull(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                      TnFbxNull& null, fbxsdk::FbxAMatrix& geometric) {
-    if (node == nullptr) {
+    if (node == nullptr)
         return fail("no node to read a null from");
-    }
     fbxsdk::FbxNodeAttribute* attribute = node->GetNodeAttribute();
     auto* source = fbxsdk::FbxCast<fbxsdk::FbxNull>(attribute);
-    if (attribute != nullptr && source == nullptr) {
+    if (attribute != nullptr && source == nullptr)
         return fail("the node is not a null");
-    }
     null.setName(node->GetName());
-    if (!getTransform(time, global, useSampleFPS, sampleFPS, node, null, geometric)) {
+    if (!getTransform(time, global, useSampleFPS, sampleFPS, node, null, geometric))
         return false;
-    }
     if (source == nullptr) { // kept: a node without an attribute is a null
         null.setNullSize(TnFbxNull::kDefaultNullSize);
         null.setNullLookType(TnFbxNull::kFbxNullLookCross);

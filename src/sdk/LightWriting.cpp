@@ -27,25 +27,22 @@ bool writeColour(ChannelWriter& writer, TnFbxLight& source, Light& light) {
     fbxsdk::FbxDouble3 colour;
     for (int i = 0; i < 3; ++i) {
         TnFbxChannel* channel = source.getLightChannel(channelAfter(TnFbxLight::kFbxLightRed, i));
-        if (channel == nullptr) {
+        if (channel == nullptr)
             return false;
-        }
         channels[static_cast<std::size_t>(i)] = channel;
         colour[i] = static_cast<double>(channel->getValue());
     }
     light.Color.Set(colour);
-    for (std::size_t i = 0; i < channels.size(); ++i) {
+    for (std::size_t i = 0; i < channels.size(); ++i)
         writer.key(light.Color, kComponents[i], channels[i]);
-    }
     return true;
 }
 
 /// From 1 to percent, in single precision.
 bool writeIntensity(ChannelWriter& writer, TnFbxLight& source, Light& light) {
     TnFbxChannel* intensity = source.getLightChannel(TnFbxLight::kFbxLightIntensity);
-    if (intensity == nullptr) {
+    if (intensity == nullptr)
         return false;
-    }
     light.Intensity.Set(static_cast<double>(intensity->getValue() / TnFbxLight::kNormalizeLightIntensity));
     writer.key(light.Intensity, nullptr, intensity, 1.0f / TnFbxLight::kNormalizeLightIntensity);
     return true;
@@ -75,14 +72,12 @@ bool writeType(ChannelWriter& writer, TnFbxLight& source, Light& light) {
     const TnFbxLight::EFbxLightType type = source.getLightType();
     if (type == TnFbxLight::kFbxLightSpot) {
         TnFbxChannel* cone = source.getLightChannel(TnFbxLight::kFbxLightConeAngle);
-        if (cone == nullptr) {
+        if (cone == nullptr)
             return false;
-        }
         writer.write(light.OuterAngle, cone);
     }
-    if (type == TnFbxLight::kFbxLightSpot || type == TnFbxLight::kFbxLightPoint) { // kept: not of directional lights
+    if (type == TnFbxLight::kFbxLightSpot || type == TnFbxLight::kFbxLightPoint) // kept: not of directional lights
         writeDecay(source, light);
-    }
     return true;
 }
 
@@ -96,17 +91,14 @@ bool hasDirection(const TnFbxLight& light) {
 
 bool FbxSdk::setLightCurveValues(fbxsdk::FbxNode* node, TnFbxLight* light) {
     Light* target = node != nullptr ? node->GetLight() : nullptr;
-    if (target == nullptr || light == nullptr) {
+    if (target == nullptr || light == nullptr)
         return fail("no node with a light, or no light to write");
-    }
-    if (!setTransformCurveValues(node, light)) {
+    if (!setTransformCurveValues(node, light))
         return false;
-    }
     ChannelWriter writer(currentLayer(), *mFrameTimes, *mMemory);
     if (!writeColour(writer, *light, *target) || !writeIntensity(writer, *light, *target) ||
-        !writeType(writer, *light, *target)) {
+        !writeType(writer, *light, *target))
         return fail("the light lacks a channel");
-    }
     if (hasDirection(*light)) {
         node->SetPostRotation(fbxsdk::FbxNode::eSourcePivot, fbxsdk::FbxVector4(-90.0, 0.0, 0.0, 1.0));
         node->SetRotationActive(true);

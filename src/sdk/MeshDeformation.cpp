@@ -46,26 +46,22 @@ bool hasClusters(const fbxsdk::FbxMesh& mesh) {
 
 void closeCache(fbxsdk::FbxVertexCacheDeformer& deformer) {
     fbxsdk::FbxCache* cache = deformer.GetCache();
-    if (cache != nullptr && deformer.Active.Get() && cache->IsOpen()) {
+    if (cache != nullptr && deformer.Active.Get() && cache->IsOpen())
         cache->CloseFile();
-    }
 }
 
 /// Opens the cache unless an instance has done so already. Returns why it cannot be used; empty when it can.
 ///
 /// kept: one that does not open is switched off, and the mesh then reads without it.
 std::string openingFault(fbxsdk::FbxVertexCacheDeformer& deformer) {
-    if (!deformer.Active.Get()) {
+    if (!deformer.Active.Get())
         return "it is switched off";
-    }
     fbxsdk::FbxCache* cache = deformer.GetCache();
-    if (cache == nullptr) {
+    if (cache == nullptr)
         return "the file does not specify a cache";
-    }
     fbxsdk::FbxStatus status;
-    if (cache->IsOpen() || cache->OpenFileForRead(&status)) {
+    if (cache->IsOpen() || cache->OpenFileForRead(&status))
         return {};
-    }
     deformer.Active.Set(false);
     return status.GetErrorString();
 }
@@ -85,9 +81,8 @@ void warnOfCache(const std::string& fileName, const fbxsdk::FbxGeometry& geometr
 void addTarget(const fbxsdk::FbxShape& shape, const Point* base, int pointCount, double weight, Point* points) {
     const Point* target = shape.GetControlPoints();
     const int count = target != nullptr ? std::min(pointCount, shape.GetControlPointsCount()) : 0;
-    for (int i = 0; i < count; ++i) {
+    for (int i = 0; i < count; ++i)
         points[i] += (target[i] - base[i]) * weight;
-    }
 }
 
 /// Adds the effect of one channel at a weight.
@@ -99,9 +94,8 @@ void addChannel(fbxsdk::FbxBlendShapeChannel& channel, double weight, const Poin
     const double* fullWeights = channel.GetTargetShapeFullWeights();
     for (int step = 0; fullWeights != nullptr && step < targetCount; ++step) {
         if (const auto target = detail::targetOfStep(step, weight, fullWeights, targetCount)) {
-            if (const fbxsdk::FbxShape* shape = channel.GetTargetShape(*target)) {
+            if (const fbxsdk::FbxShape* shape = channel.GetTargetShape(*target))
                 addTarget(*shape, base, pointCount, weight, points);
-            }
         }
     }
 }
@@ -115,9 +109,8 @@ bool FbxSdk::getDeformation(fbxsdk::FbxMesh* mesh) {
 void FbxSdk::getDeformedControlPoints(fbxsdk::FbxNode* node, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
                                       fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxVector4** points) {
     const int count = mesh != nullptr ? mesh->GetControlPointsCount() : 0;
-    if (node == nullptr || points == nullptr || count < 1) {
+    if (node == nullptr || points == nullptr || count < 1)
         return;
-    }
     const Point* source = mesh->GetControlPoints();
     delete[] * points;
     *points = nullptr;
@@ -128,21 +121,18 @@ void FbxSdk::getDeformedControlPoints(fbxsdk::FbxNode* node, fbxsdk::FbxMesh* me
         readVertexCacheData(mesh, time, *points);
         return;
     }
-    if (mesh->GetShapeCount() != 0) {
+    if (mesh->GetShapeCount() != 0)
         computeShapeDeformation(node, mesh, time, *points);
-    }
-    if (hasClusters(*mesh)) {
+    if (hasClusters(*mesh))
         computeClusterDeformation(globalPosition, mesh, time, *points);
-    }
 }
 
 void FbxSdk::readVertexCacheData(fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time, fbxsdk::FbxVector4* points) {
     fbxsdk::FbxVertexCacheDeformer* deformer = mesh != nullptr ? vertexCacheOf(*mesh) : nullptr;
     fbxsdk::FbxCache* cache = deformer != nullptr ? deformer->GetCache() : nullptr;
     const int count = mesh != nullptr ? mesh->GetControlPointsCount() : 0;
-    if (cache == nullptr || points == nullptr || count < 1) {
+    if (cache == nullptr || points == nullptr || count < 1)
         return;
-    }
 
     std::vector<double> buffer(static_cast<std::size_t>(count) * 3);
     const auto pointCount = static_cast<unsigned int>(count);
@@ -161,24 +151,19 @@ void FbxSdk::readVertexCacheData(fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time, f
         const auto frame = static_cast<unsigned int>(time.GetFrameCount(fbxsdk::FbxTime::eDefaultMode));
         read = cache->Read(frame, buffer.data(), pointCount, &status);
     }
-    if (!read) {
+    if (!read)
         warnOfCache(mFileName, *mesh, status.GetErrorString());
-    }
-    if (read && !std::all_of(buffer.begin(), buffer.end(), [](double number) { return std::isfinite(number); })) {
+    if (read && !std::all_of(buffer.begin(), buffer.end(), [](double number) { return std::isfinite(number); }))
         detail::warnAbout(mFileName, '"' + nameOf(*mesh) + "\" has points in its point cache that are not finite");
-    }
-    for (std::size_t i = 0; read && i < pointCount; ++i) {
-        for (int axis = 0; axis < 3; ++axis) {
+    for (std::size_t i = 0; read && i < pointCount; ++i)
+        for (int axis = 0; axis < 3; ++axis)
             points[i][axis] = buffer[3 * i + static_cast<std::size_t>(axis)];
-        }
-    }
 }
 
 void FbxSdk::computeShapeDeformation(fbxsdk::FbxNode* /*node*/, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
                                      fbxsdk::FbxVector4* points) {
-    if (mesh == nullptr || points == nullptr) {
+    if (mesh == nullptr || points == nullptr)
         return;
-    }
     const int pointCount = mesh->GetControlPointsCount();
     const std::vector<Point> base(points, points + pointCount);
     const std::vector<fbxsdk::FbxAnimLayer*> layers = detail::layersOf(mCurrentAnimStack);
@@ -190,31 +175,27 @@ void FbxSdk::computeShapeDeformation(fbxsdk::FbxNode* /*node*/, fbxsdk::FbxMesh*
             fbxsdk::FbxBlendShapeChannel* channel = blendShape->GetBlendShapeChannel(c);
             for (fbxsdk::FbxAnimLayer* layer : layers) { // kept: every layer with a curve adds its own
                 fbxsdk::FbxAnimCurve* curve = mesh->GetShapeChannel(b, c, layer, /*pCreateAsNeeded*/ false);
-                if (channel != nullptr && curve != nullptr) {
+                if (channel != nullptr && curve != nullptr)
                     addChannel(*channel, static_cast<double>(curve->Evaluate(time)), base.data(), pointCount, points);
-                }
             }
         }
     }
 }
 
 bool FbxSdk::openClosePointCacheData(fbxsdk::FbxScene* scene, bool open) {
-    if (scene == nullptr) {
+    if (scene == nullptr)
         return fail("no scene to open point caches of");
-    }
     const int nodeCount = scene->GetNodeCount();
     for (int i = 0; i < nodeCount; ++i) {
         fbxsdk::FbxNode* node = scene->GetNode(i);
         const fbxsdk::FbxGeometry* geometry = node != nullptr ? node->GetGeometry() : nullptr;
         fbxsdk::FbxVertexCacheDeformer* deformer = geometry != nullptr ? vertexCacheOf(*geometry) : nullptr;
-        if (deformer == nullptr) {
+        if (deformer == nullptr)
             continue;
-        }
-        if (!open) {
+        if (!open)
             closeCache(*deformer);
-        } else if (const std::string fault = openingFault(*deformer); !fault.empty()) {
+        else if (const std::string fault = openingFault(*deformer); !fault.empty())
             warnOfCache(mFileName, *geometry, fault);
-        }
     }
     return true; // closing follows the work, whose failure stays noted
 }

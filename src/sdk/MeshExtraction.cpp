@@ -58,9 +58,8 @@ BakeMatrices bakeMatrices(const TnFbxTransform& transform, bool atFrame, float f
     bake.points.SetTRS(vectorAt(transform, TnFbxTransform::kFbxTransformPositionX, atFrame, frame),
                        vectorAt(transform, TnFbxTransform::kFbxTransformRotationX, atFrame, frame),
                        vectorAt(transform, TnFbxTransform::kFbxTransformScaleX, atFrame, frame));
-    if (!global) {
+    if (!global)
         bake.points = bake.points * geometric;
-    }
     bake.normals.SetTRS(fbxsdk::FbxVector4(0.0, 0.0, 0.0, 1.0), bake.points.GetR(),
                         fbxsdk::FbxVector4(1.0, 1.0, 1.0, 1.0));
     return bake;
@@ -68,9 +67,8 @@ BakeMatrices bakeMatrices(const TnFbxTransform& transform, bool atFrame, float f
 
 std::int64_t polygonVertexCount(const fbxsdk::FbxMesh& source) {
     std::int64_t count = 0;
-    for (int polygon = 0; polygon < source.GetPolygonCount(); ++polygon) {
+    for (int polygon = 0; polygon < source.GetPolygonCount(); ++polygon)
         count += source.GetPolygonSize(polygon);
-    }
     return count;
 }
 
@@ -99,9 +97,8 @@ void fillLayout(const fbxsdk::FbxMesh& source, int cornerCount, MeshArrays& arra
     for (int polygon = 0; polygon < polygonCount; ++polygon) {
         const int size = source.GetPolygonSize(polygon);
         const int start = source.GetPolygonVertexIndex(polygon);
-        for (int i = 0; i < size; ++i) {
+        for (int i = 0; i < size; ++i)
             arrays.addPointIndex(vertices != nullptr && start >= 0 ? vertices[start + i] : -1);
-        }
     }
 }
 
@@ -111,11 +108,9 @@ void forEachCorner(const MeshArrays& arrays, int polygonCount, Visit&& visit) {
     const int* const sizes = arrays.addedPolygonVertexSizes();
     const int* const pointIndices = arrays.addedPointIndices();
     int polygonVertex = 0;
-    for (int polygon = 0; polygon < polygonCount; ++polygon) {
-        for (const int end = polygonVertex + sizes[polygon]; polygonVertex < end; ++polygonVertex) {
+    for (int polygon = 0; polygon < polygonCount; ++polygon)
+        for (const int end = polygonVertex + sizes[polygon]; polygonVertex < end; ++polygonVertex)
             visit(Corner{polygon, polygonVertex, pointIndices[polygonVertex]});
-        }
-    }
 }
 
 /// Values on their way to a mesh: as many as stay in the processor's nearest memory.
@@ -144,11 +139,10 @@ bool convertCorners(const detail::CornerValues<Value>& stored, const Value& miss
     int count = 0;
     forEachCorner(arrays, polygonCount, [&](const Corner& corner) {
         Value& value = values[static_cast<std::size_t>(count)];
-        if (stored.read(corner, value)) {
+        if (stored.read(corner, value))
             found = true;
-        } else {
+        else
             value = missing;
-        }
         if (++count == kBlockSize) {
             passOn(count);
             count = 0;
@@ -205,13 +199,11 @@ bool fillColours(fbxsdk::FbxMesh& source, MeshArrays& arrays) {
     bool found = false;
     for (int i = 0; i < source.GetLayerCount(); ++i) {
         fbxsdk::FbxLayer* layer = source.GetLayer(i);
-        if (layer == nullptr) {
+        if (layer == nullptr)
             continue;
-        }
         const detail::LayerColours colours(*layer, materials);
-        if (!found && !colours.hasAny()) {
+        if (!found && !colours.hasAny())
             continue; // the defaults are sufficient
-        }
         auto* const target = arrays.colours();
         forEachCorner(arrays, source.GetPolygonCount(), [&](const Corner& corner) {
             const std::optional<detail::Colour> stored = colours.at(corner);
@@ -226,9 +218,8 @@ bool fillColours(fbxsdk::FbxMesh& source, MeshArrays& arrays) {
 /// The values of all layers, in the layout that is filled, too, unless it is that of another node's mesh.
 void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, int cornerCount, bool isAlike,
                  MeshArrays& arrays, TnFbxMesh& mesh) {
-    if (!isAlike) {
+    if (!isAlike)
         fillLayout(source, cornerCount, arrays);
-    }
     bool normals = false, uvs = isAlike && mesh.getValidUVs();
     if (fbxsdk::FbxLayer* first = source.GetLayer(0)) {
         normals = fillNormals(source, *first, bake, cornerCount, arrays);
@@ -246,14 +237,12 @@ void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, int co
 bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                      bool transformPoints, TnFbxMesh& mesh, fbxsdk::FbxAMatrix& geometric) {
     auto* source = fbxsdk::FbxCast<fbxsdk::FbxMesh>(node != nullptr ? node->GetNodeAttribute() : nullptr);
-    if (source == nullptr) {
+    if (source == nullptr)
         return fail("no node with a mesh to read");
-    }
     const detail::ReadScope scope(*this);
     mesh.setName(node->GetName());
-    if (!getTransform(time, global, useSampleFPS, sampleFPS, node, mesh, geometric)) {
+    if (!getTransform(time, global, useSampleFPS, sampleFPS, node, mesh, geometric))
         return false;
-    }
     const BakeMatrices bake = bakeMatrices(mesh, transformPoints, time.getFrame(), global, geometric);
     const fbxsdk::FbxAMatrix* pointBake = transformPoints ? &bake.points : nullptr;
     const fbxsdk::FbxAMatrix* normalBake = transformPoints ? &bake.normals : nullptr;
@@ -272,13 +261,12 @@ bool FbxSdk::getMesh(TnFbxTime& time, bool global, bool useSampleFPS, float samp
         return scope.finish(succeed());
     }
     const auto* alike = isFirst ? nullptr : mInstances->find(instanced);
-    if (alike != nullptr) {
+    if (alike != nullptr)
         arrays.allocateLike(*alike);
-    } else if (cornerCount > std::numeric_limits<int>::max() ||
-               !arrays.allocate(source->GetPolygonCount(), source->GetControlPointsCount(),
-                                static_cast<int>(cornerCount))) {
+    else if (cornerCount > std::numeric_limits<int>::max() ||
+             !arrays.allocate(source->GetPolygonCount(), source->GetControlPointsCount(),
+                              static_cast<int>(cornerCount)))
         return fail(std::string("the mesh of \"") + node->GetName() + "\" has no polygons or no points");
-    }
     setControlPoints(time, *node, *source, pointBake, arrays);
     fillCorners(*source, normalBake, static_cast<int>(cornerCount), alike != nullptr, arrays, mesh);
     if (isInstance) {
@@ -301,9 +289,8 @@ void FbxSdk::setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::Fb
         fbxsdk::FbxVector4* made = nullptr;
         getDeformedControlPoints(&node, &source, moment, identity, &made);
         deformed.reset(made);
-        if (made == nullptr) {
+        if (made == nullptr)
             return;
-        }
     }
     // In blocks: points that are still in a file need not all be in memory.
     const int count = source.GetControlPointsCount();
@@ -311,14 +298,14 @@ void FbxSdk::setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::Fb
     std::array<MeshArrays::Vector, kBlockSize> points;
     for (int first = 0; first < count; first += kBlockSize) {
         const int size = std::min(kBlockSize, count - first);
-        if (isDeformed) {
+        if (isDeformed)
             std::copy_n(&deformed[static_cast<std::size_t>(first)], size, block.begin());
-        } else {
+        else
             detail::readControlPoints(source, first, size, block.data());
-        }
         if (bake != nullptr) {
-            std::transform(block.begin(), block.begin() + size, block.begin(),
-                           [bake](const fbxsdk::FbxVector4& point) { return bake->MultT(point); });
+            std::transform(
+                block.begin(), block.begin() + size, block.begin(),
+                [bake](const fbxsdk::FbxVector4& point) { return bake->MultT(point); });
         }
         std::transform(block.begin(), block.begin() + size, points.begin(), narrow);
         arrays.addControlPoints(points.data(), static_cast<std::size_t>(size));

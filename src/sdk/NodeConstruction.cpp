@@ -24,9 +24,8 @@ std::nullptr_t none(const char* reason) {
 template <class Container>
 fbxsdk::FbxNode* nodeWith(fbxsdk::FbxNodeAttribute* attribute, Container* container, const std::string& name) {
     fbxsdk::FbxNode* node = attribute != nullptr ? fbxsdk::FbxNode::Create(container, name.c_str()) : nullptr;
-    if (node == nullptr) {
+    if (node == nullptr)
         return none("the node cannot be created");
-    }
     node->SetNodeAttribute(attribute);
     succeed();
     return node;
@@ -34,19 +33,16 @@ fbxsdk::FbxNode* nodeWith(fbxsdk::FbxNodeAttribute* attribute, Container* contai
 
 /// Null, or why no mesh can be created.
 const char* faultOf(const TnFbxMesh& mesh) {
-    if (mesh.getNumberOfControlPoints() < 1 || mesh.getNumberOfPolygons() < 1 ||
-        mesh.getNumberOfPolygonVertices() < 1) {
+    if (mesh.getNumberOfControlPoints() < 1 || mesh.getNumberOfPolygons() < 1 || mesh.getNumberOfPolygonVertices() < 1)
         return "the mesh has no geometry";
-    }
     return detail::claimsTooManyCorners(mesh) ? "the polygons have more polygon vertices than the mesh" : nullptr;
 }
 
 } // namespace
 
 fbxsdk::FbxNode* FbxSdk::createCamera(fbxsdk::FbxScene* scene, const std::string& name) {
-    if (scene == nullptr) {
+    if (scene == nullptr)
         return none("no scene to create a camera in");
-    }
     fbxsdk::FbxCamera* camera = fbxsdk::FbxCamera::Create(scene, name.c_str());
     if (camera != nullptr) {
         camera->SetApertureMode(fbxsdk::FbxCamera::eVertical);
@@ -58,9 +54,8 @@ fbxsdk::FbxNode* FbxSdk::createCamera(fbxsdk::FbxScene* scene, const std::string
 }
 
 fbxsdk::FbxNode* FbxSdk::createNull(fbxsdk::FbxManager* manager, const std::string& name) {
-    if (manager == nullptr) {
+    if (manager == nullptr)
         return none("no FBX manager to create a null with");
-    }
     fbxsdk::FbxNull* null = fbxsdk::FbxNull::Create(manager, name.c_str());
     if (null != nullptr) {
         null->Look.Set(fbxsdk::FbxNull::sDefaultLook);
@@ -70,9 +65,8 @@ fbxsdk::FbxNode* FbxSdk::createNull(fbxsdk::FbxManager* manager, const std::stri
 }
 
 fbxsdk::FbxNode* FbxSdk::createLight(fbxsdk::FbxScene* scene, TnFbxLight::EFbxLightType type, const std::string& name) {
-    if (scene == nullptr) {
+    if (scene == nullptr)
         return none("no scene to create a light in");
-    }
     fbxsdk::FbxLight* light = fbxsdk::FbxLight::Create(scene, name.c_str());
     if (light != nullptr) {
         switch (type) {
@@ -94,35 +88,28 @@ fbxsdk::FbxNode* FbxSdk::createLight(fbxsdk::FbxScene* scene, TnFbxLight::EFbxLi
 }
 
 fbxsdk::FbxNode* FbxSdk::createMesh(fbxsdk::FbxManager* manager, const TnFbxMesh* mesh, const std::string& name) {
-    if (manager == nullptr || mesh == nullptr) {
+    if (manager == nullptr || mesh == nullptr)
         return none("no FBX manager or no source to create a mesh from");
-    }
-    if (const char* fault = faultOf(*mesh)) {
+    if (const char* fault = faultOf(*mesh))
         return none(fault);
-    }
     fbxsdk::FbxMesh* target = fbxsdk::FbxMesh::Create(manager, name.c_str());
-    if (target == nullptr) {
+    if (target == nullptr)
         return none("the mesh cannot be created");
-    }
-    if (!detail::buildMesh(*mesh, *target)) {
+    if (!detail::buildMesh(*mesh, *target))
         return none("the layer of the mesh cannot be created");
-    }
     fbxsdk::FbxNode* node = nodeWith(target, manager, name);
-    if (node != nullptr) {
+    if (node != nullptr)
         node->SetShadingMode(fbxsdk::FbxNode::eTextureShading);
-    }
     return node;
 }
 
 fbxsdk::FbxFileTexture* FbxSdk::createTexture(fbxsdk::FbxScene* scene, const std::string& fileName) {
-    if (scene == nullptr) {
+    if (scene == nullptr)
         return none("no scene to create a texture in");
-    }
     using Texture = fbxsdk::FbxFileTexture;
     Texture* texture = Texture::Create(scene, fileName.c_str()); // kept: the file name is the object's name too
-    if (texture == nullptr) {
+    if (texture == nullptr)
         return none("the texture cannot be created");
-    }
     texture->SetFileName(fileName.c_str());
     texture->SetTextureUse(Texture::eStandard);
     texture->SetMappingType(Texture::eUV);
@@ -137,14 +124,12 @@ fbxsdk::FbxFileTexture* FbxSdk::createTexture(fbxsdk::FbxScene* scene, const std
 
 fbxsdk::FbxSurfaceLambert* FbxSdk::createLambertMaterial(fbxsdk::FbxManager* manager, const std::string& name,
                                                          int index) {
-    if (manager == nullptr) {
+    if (manager == nullptr)
         return none("no FBX manager to create a material with");
-    }
     const std::string numbered = name + std::to_string(index);
     fbxsdk::FbxSurfaceLambert* material = fbxsdk::FbxSurfaceLambert::Create(manager, numbered.c_str());
-    if (material == nullptr) {
+    if (material == nullptr)
         return none("the material cannot be created");
-    }
     constexpr fbxsdk::FbxDouble3 kBlack(0.0, 0.0, 0.0);
     constexpr fbxsdk::FbxDouble3 kGrey(0.5, 0.5, 0.5);
     material->Emissive.Set(kBlack);

@@ -49,12 +49,10 @@ std::string fileNameOf(const Cache& cache) {
 bool FbxSdk::mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* meshNode, bool mayaFormat,
                                   const std::string& fbxFileName) {
     fbxsdk::FbxGeometry* geometry = meshNode != nullptr ? meshNode->GetGeometry() : nullptr;
-    if (manager == nullptr || geometry == nullptr) {
+    if (manager == nullptr || geometry == nullptr)
         return fail("no FBX manager or no node with a mesh for a point cache");
-    }
-    if (fbxFileName.empty()) {
+    if (fbxFileName.empty())
         return fail("no file name is given");
-    }
     const char* name = meshNode->GetName();
     const auto place = detail::pointCachePlace(
         fbxFileName, name, mayaFormat ? kMayaVertexCacheFileExtension : kMaxVertexCacheFileExtension);
@@ -63,16 +61,13 @@ bool FbxSdk::mapVertexCacheOnMesh(fbxsdk::FbxManager* manager, fbxsdk::FbxNode* 
 
 bool FbxSdk::animateVertexCacheOnMesh(fbxsdk::FbxNode* meshNode, const TnFbxMesh* mesh, bool mayaFormat,
                                       bool useMcxFormat, const TnFbxTime& time) {
-    if (meshNode == nullptr || mesh == nullptr) {
+    if (meshNode == nullptr || mesh == nullptr)
         return fail("no node or no mesh to write a point cache of");
-    }
-    if (const char* fault = pointCacheFault(*mesh, time)) {
+    if (const char* fault = pointCacheFault(*mesh, time))
         return fail(std::string(meshNode->GetName()) + ": " + fault);
-    }
     Cache* cache = pointCacheOf(*meshNode);
-    if (cache == nullptr) {
+    if (cache == nullptr)
         return fail(std::string(meshNode->GetName()) + ": the node has no vertex cache");
-    }
     const detail::PointCacheForm form = {meshNode->GetName(), mayaFormat, useMcxFormat,
                                          static_cast<double>(time.getFrameRate())};
     fbxsdk::FbxStatus status;
@@ -92,9 +87,8 @@ void FbxSdk::addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const T
         detail::warn(mesh.getName() + ": written without its animation: " + lastError());
         return;
     }
-    if (animateVertexCacheOnMesh(&node, &mesh, maya, newest, time)) {
+    if (animateVertexCacheOnMesh(&node, &mesh, maya, newest, time))
         return;
-    }
     Cache* cache = pointCacheOf(node);
     const bool isOldThere = cache != nullptr && exists(fileNameOf(*cache));
     if (pointCacheFault(mesh, time) != nullptr) { // kept: the deformer stays, and names a file that does not exist
@@ -105,9 +99,8 @@ void FbxSdk::addPointCache(fbxsdk::FbxNode& node, const TnFbxMesh& mesh, const T
     detail::warn(mesh.getName() + ": written without its animation: " + lastError() +
                  (isOldThere ? "; an older point cache still exists" : ""));
     pointCacheDeformerOf(node)->Destroy();
-    if (cache != nullptr) {
+    if (cache != nullptr)
         cache->Destroy();
-    }
 }
 
 } // namespace Tarnell::Fbx

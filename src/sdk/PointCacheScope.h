@@ -12,14 +12,12 @@ namespace Tarnell::Fbx::detail {
 class PointCacheScope {
 public:
     PointCacheScope(FbxSdk& sdk, fbxsdk::FbxScene* scene) : mSdk(sdk), mScene(scene) {
-        if (mScene != nullptr) {
+        if (mScene != nullptr)
             mSdk.openClosePointCacheData(mScene, /*open*/ true);
-        }
     }
     ~PointCacheScope() {
-        if (mScene != nullptr) {
+        if (mScene != nullptr)
             mSdk.openClosePointCacheData(mScene, /*open*/ false);
-        }
     }
     PointCacheScope(const PointCacheScope&) = delete;
     PointCacheScope& operator=(const PointCacheScope&) = delete;

@@ -34,21 +34,17 @@ bool isFlatAt(const fbxsdk::FbxAnimCurve& curve, int key) {
 /// of a zero.
 bool isLevel(const fbxsdk::FbxAnimCurve& curve) {
     const int keyCount = curve.KeyGetCount();
-    if (keyCount < 2) {
+    if (keyCount < 2)
         return true;
-    }
     const float value = curve.KeyGetValue(0);
-    if (!std::isfinite(value) || (value == 0.0f && std::signbit(value))) {
+    if (!std::isfinite(value) || (value == 0.0f && std::signbit(value)))
         return false;
-    }
     const auto hasTheValue = [&curve, value](int key) {
         return curve.KeyGetValue(key) == value && std::signbit(curve.KeyGetValue(key)) == std::signbit(value);
     };
-    for (int key = 0; key < keyCount; ++key) {
-        if (!hasTheValue(key) || !isFlatAt(curve, key)) {
+    for (int key = 0; key < keyCount; ++key)
+        if (!hasTheValue(key) || !isFlatAt(curve, key))
             return false;
-        }
-    }
     return true;
 }
 
@@ -67,16 +63,13 @@ void evaluateEach(fbxsdk::FbxAnimCurve& curve, std::span<const fbxsdk::FbxTime> 
 
 std::vector<fbxsdk::FbxAnimLayer*> detail::layersOf(fbxsdk::FbxAnimStack* stack) {
     std::vector<fbxsdk::FbxAnimLayer*> layers;
-    if (stack == nullptr) {
+    if (stack == nullptr)
         return layers;
-    }
     const fbxsdk::FbxCriteria isLayer = fbxsdk::FbxCriteria::ObjectType(fbxsdk::FbxAnimLayer::ClassId);
     const int count = stack->GetSrcObjectCount(isLayer);
-    for (int i = 0; i < count; ++i) {
-        if (auto* layer = fbxsdk::FbxCast<fbxsdk::FbxAnimLayer>(stack->GetSrcObject(isLayer, i))) {
+    for (int i = 0; i < count; ++i)
+        if (auto* layer = fbxsdk::FbxCast<fbxsdk::FbxAnimLayer>(stack->GetSrcObject(isLayer, i)))
             layers.push_back(layer);
-        }
-    }
     return layers;
 }
 
@@ -92,20 +85,17 @@ void PropertySampler::collectCurves(const fbxsdk::FbxProperty& property, const c
     mCurves.clear();
     fbxsdk::FbxProperty animated = property;
     const fbxsdk::FbxString name = property.GetName();
-    for (fbxsdk::FbxAnimLayer* layer : mLayers) {
-        if (fbxsdk::FbxAnimCurve* curve = animated.GetCurve(layer, name, component, /*pCreate*/ false)) {
+    for (fbxsdk::FbxAnimLayer* layer : mLayers)
+        if (fbxsdk::FbxAnimCurve* curve = animated.GetCurve(layer, name, component, /*pCreate*/ false))
             mCurves.push_back(curve);
-        }
-    }
 }
 
 detail::SampleRange PropertySampler::keyedRange() const {
     SampleRange range;
     for (const fbxsdk::FbxAnimCurve* curve : mCurves) {
         const int keyCount = curve->KeyGetCount();
-        if (keyCount < 1) {
+        if (keyCount < 1)
             continue;
-        }
         int first = narrowFrame(curve->KeyGetTime(0).GetFrameCount(mTimeMode));
         int last = narrowFrame(curve->KeyGetTime(keyCount - 1).GetFrameCount(mTimeMode));
         if (mConvert) {
@@ -119,15 +109,14 @@ detail::SampleRange PropertySampler::keyedRange() const {
 
 float PropertySampler::valueAt(const fbxsdk::FbxTime& moment) const {
     float value = 0.0f;
-    for (fbxsdk::FbxAnimCurve* curve : mCurves) {
+    for (fbxsdk::FbxAnimCurve* curve : mCurves)
         value += curve->Evaluate(moment);
-    }
     return value;
 }
 
 bool PropertySampler::isConstant() const {
-    return std::all_of(mCurves.begin(), mCurves.end(),
-                       [](const fbxsdk::FbxAnimCurve* curve) { return isLevel(*curve); });
+    return std::all_of(
+        mCurves.begin(), mCurves.end(), [](const fbxsdk::FbxAnimCurve* curve) { return isLevel(*curve); });
 }
 
 /// The samples of a range that fits an `int`; false when there is not enough memory for them.
@@ -139,17 +128,15 @@ bool PropertySampler::sampleFrames(const SampleRange& range) {
         mSamples.setConstant(valueAt(mFrameTimes.at(range.first)));
         return true;
     }
-    if (!mAccount.take(range, mRate, /*channelCount*/ 1)) {
+    if (!mAccount.take(range, mRate, /*channelCount*/ 1))
         return false;
-    }
     constexpr std::int64_t kBlockSize = 256;
     std::array<fbxsdk::FbxTime, kBlockSize> times;
     std::array<float, kBlockSize> sums, values;
     for (std::int64_t done = 0; done < count; done += kBlockSize) {
         const auto size = static_cast<std::size_t>(std::min(kBlockSize, count - done));
-        for (std::size_t i = 0; i < size; ++i) {
+        for (std::size_t i = 0; i < size; ++i)
             times[i] = mFrameTimes.at(range.first + done + static_cast<std::int64_t>(i));
-        }
         sums.fill(0.0f);
         for (fbxsdk::FbxAnimCurve* curve : mCurves) {
             evaluateEach(*curve, std::span(times).first(size), values.data());
@@ -157,9 +144,8 @@ bool PropertySampler::sampleFrames(const SampleRange& range) {
         }
         mSamples.add(sums.data(), size);
     }
-    if (mSamples.isOneValue()) {
+    if (mSamples.isOneValue())
         mAccount.giveBack(range);
-    }
     return true;
 }
 
@@ -168,13 +154,11 @@ bool PropertySampler::sample(const fbxsdk::FbxProperty& property, const char* co
     mSamples.begin(0);
     collectCurves(property, component);
     const SampleRange range = keyedRange();
-    if (!range.isAnimation()) {
+    if (!range.isAnimation())
         return false;
-    }
 
-    if (frameCount(range.first, range.last) > 0 && !sampleFrames(range)) {
+    if (frameCount(range.first, range.last) > 0 && !sampleFrames(range))
         return false;
-    }
     mTime = sampledTime(range, mRate);
     return true;
 }

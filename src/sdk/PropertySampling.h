@@ -85,17 +85,15 @@ public:
     template <class Object, class Channel>
     void sampleInto(Object& object, Channel channel, const fbxsdk::FbxProperty& property,
                     const char* component = nullptr) {
-        if (sample(property, component)) {
+        if (sample(property, component))
             mSamples.moveInto(channelOf(object, channel), mTime);
-        }
     }
 
     /// The three components of a vector into three consecutive channels.
     template <class Object, class Channel>
     void sampleVectorInto(Object& object, Channel firstChannel, const fbxsdk::FbxProperty& property) {
-        for (int i = 0; i < 3; ++i) {
+        for (int i = 0; i < 3; ++i)
             sampleInto(object, channelAfter(firstChannel, i), property, kComponents[i]);
-        }
     }
 
     /// Static value and samples of a scalar property.

@@ -31,12 +31,10 @@ ReadScope::~ReadScope() {
 }
 
 bool ReadScope::finish(bool result) const {
-    if (mIsOutermost) {
+    if (mIsOutermost)
         mSdk.mWarnings->report();
-    }
-    if (!mIsOutermost || !result || !mSdk.mMemory->exceeded()) {
+    if (!mIsOutermost || !result || !mSdk.mMemory->exceeded())
         return result;
-    }
     const std::string file = mSdk.mFileName.empty() ? "" : mSdk.mFileName + ": ";
     return fail(file + mSdk.mSamples->describe() + mSdk.mMemory->describe());
 }

@@ -8,9 +8,8 @@
 namespace Tarnell::Fbx {
 
 std::string detail::SampleAccount::describe() const {
-    if (mFrames.first > mFrames.last) {
+    if (mFrames.first > mFrames.last)
         return {};
-    }
     std::array<char, 96> text{};
     std::snprintf(text.data(), text.size(), "frames %d to %d at %g frames per second: ", mFrames.first, mFrames.last,
                   static_cast<double>(mRate));

@@ -49,11 +49,9 @@ constexpr TimeModeRow kTimeModes[] = {
 constexpr float kTimeModeTolerance = 1e-5f;
 
 Time::EMode timeModeOf(float framesPerSecond) {
-    for (const TimeModeRow& row : kTimeModes) {
-        if (std::abs(framesPerSecond - row.framesPerSecond) < kTimeModeTolerance) {
+    for (const TimeModeRow& row : kTimeModes)
+        if (std::abs(framesPerSecond - row.framesPerSecond) < kTimeModeTolerance)
             return row.mode;
-        }
-    }
     return Time::eCustom;
 }
 
@@ -107,9 +105,8 @@ public:
 
     /// kept: meshes of one name write the same file.
     void noteCacheOf(const std::string& mesh) {
-        if (!mCached.insert(mesh).second) {
+        if (!mCached.insert(mesh).second)
             warnings.add(mesh, "meshes with the same name share one point cache, that of the last of them");
-        }
     }
 
     /// States the span of time, and reports the warnings.
@@ -140,70 +137,76 @@ bool FbxSdk::createScene(const TnFbxWriteInfo& info, const std::vector<TnFbxCame
                          const std::vector<TnFbxLight*>& lights, const std::vector<TnFbxTransform*>& transforms,
                          const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) {
     const detail::CallScope call;
-    if (!mInitialized || mManager == nullptr || mScene == nullptr) {
+    if (!mInitialized || mManager == nullptr || mScene == nullptr)
         return fail("the FBX manager is not initialised");
-    }
     initCreateAnimationStack();
     // kept: the new stack is "Take 001"; another name selects nothing and changes nothing
     createScene(mManager, mScene, info.getFPS(), info.getAnimationStackName());
     fbxsdk::FbxNode* root = mScene->GetRootNode();
-    if (root == nullptr) {
+    if (root == nullptr)
         return fail("the scene has no root node");
-    }
 
     const KeyScope keys(*mMemory);
     SceneBuilder builder(*root, mCurrentAnimStack);
     // kept: cameras and lights are created in the scene, everything else by the manager
     if (info.getWriteCameras()) {
-        builder.addNodes(cameras, [this](TnFbxCamera& camera) {
-            fbxsdk::FbxNode* node = createCamera(mScene, camera.getName());
-            setCameraCurveValues(node, &camera);
-            return node;
-        });
+        builder.addNodes(
+            cameras,
+            [this](TnFbxCamera& camera) {
+                fbxsdk::FbxNode* node = createCamera(mScene, camera.getName());
+                setCameraCurveValues(node, &camera);
+                return node;
+            });
     }
     if (info.getWriteLights()) {
-        builder.addNodes(lights, [this](TnFbxLight& light) {
-            fbxsdk::FbxNode* node = createLight(mScene, light.getLightType(), light.getName());
-            setLightCurveValues(node, &light);
-            return node;
-        });
+        builder.addNodes(
+            lights,
+            [this](TnFbxLight& light) {
+                fbxsdk::FbxNode* node = createLight(mScene, light.getLightType(), light.getName());
+                setLightCurveValues(node, &light);
+                return node;
+            });
     }
     if (info.getWriteTransforms()) {
-        builder.addNodes(transforms, [this](TnFbxTransform& transform) {
-            fbxsdk::FbxNode* node = createNull(mManager, transform.getName());
-            setTransformCurveValues(node, &transform);
-            return node;
-        });
+        builder.addNodes(
+            transforms,
+            [this](TnFbxTransform& transform) {
+                fbxsdk::FbxNode* node = createNull(mManager, transform.getName());
+                setTransformCurveValues(node, &transform);
+                return node;
+            });
     }
     if (info.getWriteNulls()) {
-        builder.addNodes(nulls, [this](TnFbxNull& null) {
-            fbxsdk::FbxNode* node = createNull(mManager, null.getName());
-            setNullCurveValues(node, &null);
-            return node;
-        });
+        builder.addNodes(
+            nulls,
+            [this](TnFbxNull& null) {
+                fbxsdk::FbxNode* node = createNull(mManager, null.getName());
+                setNullCurveValues(node, &null);
+                return node;
+            });
     }
     if (info.getWriteMeshes()) { // kept: of a mesh only the points are written, not its transform
-        builder.addNodes(meshes, [&](const TnFbxMesh& mesh) {
-            fbxsdk::FbxNode* node = createMesh(mManager, &mesh, mesh.getName());
-            if (node != nullptr && info.getAnimateMeshVertices()) {
-                builder.noteCacheOf(mesh.getName());
-                addPointCache(*node, mesh, info, timeOf(info), builder.warnings);
-            }
-            return node;
-        });
+        builder.addNodes(
+            meshes,
+            [&](const TnFbxMesh& mesh) {
+                fbxsdk::FbxNode* node = createMesh(mManager, &mesh, mesh.getName());
+                if (node != nullptr && info.getAnimateMeshVertices()) {
+                    builder.noteCacheOf(mesh.getName());
+                    addPointCache(*node, mesh, info, timeOf(info), builder.warnings);
+                }
+                return node;
+            });
     }
     builder.finish(info, *mScene);
-    if (mMemory->exceeded()) {
+    if (mMemory->exceeded())
         return fail(info.getFileName() + ": " + mMemory->describe("keys"));
-    }
     return succeed(); // kept: also when a curve or a point cache could not be written
 }
 
 bool FbxSdk::createScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, float framesPerSecond,
                          const std::string& animationStackName) {
-    if (manager == nullptr || scene == nullptr) {
+    if (manager == nullptr || scene == nullptr)
         return fail("no FBX manager or no scene to set up");
-    }
     setGlobalLightSettings(scene);
     setGlobalCameraSettings(scene);
     setGlobalTimeSettings(scene, framesPerSecond);
@@ -213,9 +216,8 @@ bool FbxSdk::createScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, f
 
 // kept: an orange ambient light and a magenta fog in every file
 bool FbxSdk::setGlobalLightSettings(fbxsdk::FbxScene* scene) {
-    if (scene == nullptr) {
+    if (scene == nullptr)
         return fail("no scene for the global light settings");
-    }
     fbxsdk::FbxGlobalLightSettings& settings = scene->GlobalLightSettings();
     settings.SetAmbientColor(fbxsdk::FbxColor(1.0, 0.5, 0.2, 1.0));
     settings.SetFogEnable(true);
@@ -228,9 +230,8 @@ bool FbxSdk::setGlobalLightSettings(fbxsdk::FbxScene* scene) {
 }
 
 bool FbxSdk::setGlobalCameraSettings(fbxsdk::FbxScene* scene) {
-    if (scene == nullptr) {
+    if (scene == nullptr)
         return fail("no scene for the global camera settings");
-    }
     fbxsdk::FbxGlobalCameraSettings& settings = scene->GlobalCameraSettings();
     settings.SetDefaultCamera("Camera Switcher", /*pStatus*/ nullptr);
     settings.CreateProducerCameras();
@@ -239,9 +240,8 @@ bool FbxSdk::setGlobalCameraSettings(fbxsdk::FbxScene* scene) {
 
 // kept: a custom mode gets no rate
 bool FbxSdk::setGlobalTimeSettings(fbxsdk::FbxScene* scene, float framesPerSecond) {
-    if (scene == nullptr) {
+    if (scene == nullptr)
         return fail("no scene for the global time settings");
-    }
     const detail::TimeModeScope timeMode; // the scene's settings would set theirs
     scene->GetGlobalSettings().SetTimeMode(timeModeOf(framesPerSecond));
     return succeed();

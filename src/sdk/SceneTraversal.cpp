@@ -69,9 +69,8 @@ constexpr MaskRow kMaskRows[] = {
 
 std::uint32_t selectedTypes(long mask) {
     std::uint32_t types = 0;
-    for (const MaskRow& row : kMaskRows) {
+    for (const MaskRow& row : kMaskRows)
         types |= (mask & row.maskBit) != 0 ? row.types : 0;
-    }
     return types;
 }
 
@@ -95,9 +94,8 @@ constexpr ProducerRow kProducers[] = {
 fbxsdk::FbxGlobalCameraSettings& ensureProducers(fbxsdk::FbxScene& scene) {
     fbxsdk::FbxGlobalCameraSettings& settings = scene.GlobalCameraSettings();
     if (std::none_of(std::begin(kProducers), std::end(kProducers),
-                     [&settings](const ProducerRow& row) { return (settings.*row.camera)() != nullptr; })) {
+                     [&settings](const ProducerRow& row) { return (settings.*row.camera)() != nullptr; }))
         settings.CreateProducerCameras();
-    }
     return settings;
 }
 
@@ -174,19 +172,22 @@ void warnOfSurfaces(const std::string& fileName, fbxsdk::FbxScene& scene, std::u
                     const std::string* objectName) {
     int count = 0;
     if (types != 0) {
-        detail::walkBelow(scene.GetRootNode(), [&](fbxsdk::FbxNode& node) {
-            const bool wanted = objectName == nullptr || *objectName == node.GetName();
-            count += wanted && (typeBit(node) & types) != 0 ? 1 : 0;
-            return true;
-        });
+        detail::walkBelow(
+            scene.GetRootNode(),
+            [&](fbxsdk::FbxNode& node) {
+                const bool wanted = objectName == nullptr || *objectName == node.GetName();
+                count += wanted && (typeBit(node) & types) != 0 ? 1 : 0;
+                return true;
+            });
     }
     if (count > 0 && objectName != nullptr) {
         detail::warnAbout(fileName, '"' + *objectName +
                                         "\" is a NURBS surface, which is counted but not read: the "
                                         "object returned for it has neither a name nor values");
     } else if (count > 0) {
-        detail::warnAbout(fileName, std::to_string(count) + " NURBS surfaces are counted but not read: as many objects "
-                                                            "at the end of the array have neither a name nor values");
+        detail::warnAbout(fileName, std::to_string(count) + (count == 1 ? " NURBS surface is" : " NURBS surfaces are") +
+                                        " counted but not read: as many objects "
+                                        "at the end of the array have neither a name nor values");
     }
 }
 
@@ -219,12 +220,10 @@ void readNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node, Obje
 /// Reads the node if it is of the kind and requested. False when the array has no element left for it.
 template <class Object>
 bool visitNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node) {
-    if ((typeBit(node) & kKind<Object>.types) == 0) {
+    if ((typeBit(node) & kKind<Object>.types) == 0)
         return true;
-    }
-    if (walk.index < 0 || walk.index >= walk.capacity) {
+    if (walk.index < 0 || walk.index >= walk.capacity)
         return fail(std::string("the array is too small for \"") + node.GetName() + '"');
-    }
     if (walk.allObjects) {
         readNode(sdk, walk, node, walk.objects[walk.index]);
         ++walk.index;
@@ -242,18 +241,15 @@ constexpr bool kIsPlacedInWorld = !std::is_same_v<Object, TnFbxCamera>;
 /// The sampler of everything that a traversal will read in the world; null when that is nothing.
 template <class Object>
 std::unique_ptr<detail::GlobalSampler> globalsOf(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode* top) {
-    if (!kIsPlacedInWorld<Object> || !walk.flags.globalTransform ||
-        walk.time.getStartFrame() > walk.time.getEndFrame()) {
+    if (!kIsPlacedInWorld<Object> || !walk.flags.globalTransform || walk.time.getStartFrame() > walk.time.getEndFrame())
         return nullptr;
-    }
     auto globals = std::make_unique<detail::GlobalSampler>(sdk, walk.time);
     int room = walk.capacity - walk.index;
     detail::walkNodes(top, [&](fbxsdk::FbxNode& node) {
         const bool isRead =
             (typeBit(node) & kKind<Object>.types) != 0 && (walk.allObjects || walk.objectName == node.GetName());
-        if (isRead) {
+        if (isRead)
             globals->add(node, geometricOffset<Object>(node));
-        }
         return !isRead || (walk.allObjects && --room > 0);
     });
     return globals;
@@ -277,14 +273,12 @@ private:
 /// A node and its descendants, until the array is full or the requested object was found.
 template <class Walk>
 bool FbxSdk::walkSubtree(const Walk& walk, fbxsdk::FbxNode* top) {
-    if (walk.objects == nullptr) {
+    if (walk.objects == nullptr)
         return fail("no array to read into");
-    }
     const detail::ReadScope scope(*this);
     const Temporarily globals(mGlobals, globalsOf(*this, walk, top));
-    if (mGlobals != nullptr) {
+    if (mGlobals != nullptr)
         mGlobals->sample(*mSamples);
-    }
     bool hasRoom = true;
     const bool walked = detail::failOnFault(/*fileName: the fault names it*/ "", [&] {
         detail::walkNodes(top, [&](fbxsdk::FbxNode& node) {
@@ -325,9 +319,8 @@ int FbxSdk::getNumberOfNulls() const { return getNumberOfNodeTypes(NodeMask::kNu
 int FbxSdk::getNumberOfTransforms() const { return getNumberOfNodeTypes(NodeMask::kTransforms); }
 
 int FbxSdk::getNumberOfCameras() const {
-    if (!mInitialized || mScene == nullptr) {
+    if (!mInitialized || mScene == nullptr)
         return 0;
-    }
     const fbxsdk::FbxGlobalCameraSettings& settings = ensureProducers(*mScene);
     const auto producerCount =
         std::count_if(std::begin(kProducers), std::end(kProducers),
@@ -339,30 +332,25 @@ int FbxSdk::getNumberOfCameras() const {
 
 bool FbxSdk::getNodeNames(long mask, std::vector<std::string>& names) {
     names.clear();
-    if (mScene == nullptr) {
+    if (mScene == nullptr)
         return fail("no scene is loaded");
-    }
     if ((mask & NodeMask::kCameras) != 0) {
         const fbxsdk::FbxGlobalCameraSettings& settings = ensureProducers(*mScene);
-        for (const ProducerRow& row : kProducers) {
-            if ((settings.*row.camera)() != nullptr) {
+        for (const ProducerRow& row : kProducers)
+            if ((settings.*row.camera)() != nullptr)
                 names.emplace_back(row.name);
-            }
-        }
     }
     fbxsdk::FbxNode* root = mScene->GetRootNode();
-    for (int i = 0; root != nullptr && i < root->GetChildCount(); ++i) {
+    for (int i = 0; root != nullptr && i < root->GetChildCount(); ++i)
         getNodeNamesRecursive(root->GetChild(i), mask, names);
-    }
     return succeed();
 }
 
 bool FbxSdk::getNodeNamesRecursive(fbxsdk::FbxNode* node, long mask, std::vector<std::string>& names) {
     const std::uint32_t types = selectedTypes(mask);
     return detail::walkNodes(node, [&](fbxsdk::FbxNode& visited) {
-        if ((typeBit(visited) & types) != 0) {
+        if ((typeBit(visited) & types) != 0)
             names.emplace_back(visited.GetName());
-        }
         return true;
     });
 }
@@ -372,21 +360,18 @@ bool FbxSdk::getNodeNamesRecursive(fbxsdk::FbxNode* node, long mask, std::vector
 template <class Object>
 bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     const detail::CallScope call;
-    if (objects == nullptr || count < 1) {
+    if (objects == nullptr || count < 1)
         return fail("no array to read into");
-    }
-    if (!mInitialized || mScene == nullptr) {
+    if (!mInitialized || mScene == nullptr)
         return fail("no scene is loaded");
-    }
     const detail::TimeModeScope timeMode(mScene);
     const detail::ReadScope scope(*this);
     TnFbxTime time;
     getGlobalAnimationStackTime(time, info.getFrame(), info.getUseSampleFPS(), info.getSampleFPS());
     int index = 0;
     if constexpr (std::is_same_v<Object, TnFbxCamera>) {
-        if (!readProducerCameras(info, objects, count, index)) {
+        if (!readProducerCameras(info, objects, count, index))
             return false;
-        }
     }
 
     const detail::PointCacheScope caches(*this, std::is_same_v<Object, TnFbxMesh> ? mScene : nullptr);
@@ -396,9 +381,8 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     const Walk<Object> walk = {time, flags, info.getAllObjects(), info.getObjectName(), objects, count, index, found};
     bool result = succeed();
     fbxsdk::FbxNode* root = mScene->GetRootNode();
-    for (int i = 0; root != nullptr && result && !found && i < root->GetChildCount(); ++i) {
+    for (int i = 0; root != nullptr && result && !found && i < root->GetChildCount(); ++i)
         result = walkSubtree(walk, root->GetChild(i));
-    }
     if (result && !found) {
         warnOfSurfaces(mFileName, *mScene, kCountedOnly<Object>,
                        info.getAllObjects() ? nullptr : &info.getObjectName());
@@ -421,12 +405,10 @@ bool FbxSdk::readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int 
     const fbxsdk::FbxGlobalCameraSettings& settings = ensureProducers(*mScene);
     for (const ProducerRow& row : kProducers) {
         fbxsdk::FbxCamera* camera = (settings.*row.camera)();
-        if (camera == nullptr) {
+        if (camera == nullptr)
             continue;
-        }
-        if (index >= count) {
+        if (index >= count)
             return fail(std::string("the array is too small for \"") + row.name + '"');
-        }
         getProducerCamera(camera, info, cameras, row.name, index);
     }
     return true;
@@ -434,13 +416,11 @@ bool FbxSdk::readProducerCameras(TnFbxReadInfo& info, TnFbxCamera* cameras, int 
 
 bool FbxSdk::getProducerCamera(fbxsdk::FbxCamera* camera, TnFbxReadInfo& info, TnFbxCamera* cameras, const char* name,
                                int& index) {
-    if (camera == nullptr || cameras == nullptr || name == nullptr) {
+    if (camera == nullptr || cameras == nullptr || name == nullptr)
         return fail("no producer camera, or no array to read it into");
-    }
     fbxsdk::FbxNode* node = camera->GetNode(0);
-    if (node == nullptr) {
+    if (node == nullptr)
         return fail(std::string("\"") + name + "\" is not attached to a node");
-    }
     if (info.getAllObjects()) {
         getProducerCamera(node, camera, cameras[index], name);
         ++index;

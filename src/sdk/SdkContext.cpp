@@ -49,9 +49,8 @@ constexpr const char* kImportSettings[] = {
 /// defaults.
 void createImportSettings(fbxsdk::FbxManager* manager) {
     fbxsdk::FbxIOSettings* settings = fbxsdk::FbxIOSettings::Create(manager, "IOSRoot");
-    for (const char* path : kImportSettings) {
+    for (const char* path : kImportSettings)
         settings->SetBoolProp(path, true);
-    }
 }
 
 fbxsdk::FbxCriteria isStack() { return fbxsdk::FbxCriteria::ObjectType(fbxsdk::FbxAnimStack::ClassId); }
@@ -63,9 +62,8 @@ fbxsdk::FbxAnimStack* stackAt(fbxsdk::FbxScene& scene, int index) {
 /// The platform evaluates the same stack. The stack that is set is recorded in the scene's file, so it is set
 /// only when it changes.
 void evaluateStack(fbxsdk::FbxScene& scene, fbxsdk::FbxAnimStack* stack) {
-    if (scene.GetCurrentAnimationStack() != stack) {
+    if (scene.GetCurrentAnimationStack() != stack)
         scene.SetCurrentAnimationStack(stack);
-    }
 }
 
 } // namespace
@@ -83,27 +81,24 @@ FbxSdk::~FbxSdk() {
 
 // kept: nothing of the other context is copied
 FbxSdk& FbxSdk::operator=(const FbxSdk& other) {
-    if (this != &other) {
+    if (this != &other)
         initFbxSdkManager();
-    }
     return *this;
 }
 
 bool FbxSdk::initFbxSdkManager() {
     if (!mInitialized) {
         destroySdkObjects(&mManager); // of an attempt that failed half-way
-        if (!initializeSdkObjects(&mManager, &mScene)) {
+        if (!initializeSdkObjects(&mManager, &mScene))
             return false;
-        }
         mInitialized = true;
     }
     return succeed();
 }
 
 bool FbxSdk::destroyFbxSdkManager() {
-    if (!mInitialized) {
+    if (!mInitialized)
         return fail("there is no FBX manager to destroy");
-    }
     destroySdkObjects(&mManager);
     mScene = nullptr; // both were destroyed with the manager
     mFileName.clear();
@@ -113,13 +108,11 @@ bool FbxSdk::destroyFbxSdkManager() {
 }
 
 bool FbxSdk::initializeSdkObjects(fbxsdk::FbxManager** manager, fbxsdk::FbxScene** scene) {
-    if (manager == nullptr || scene == nullptr) {
+    if (manager == nullptr || scene == nullptr)
         return fail("the pointer to the FBX manager or its scene is null");
-    }
     *manager = fbxsdk::FbxManager::Create();
-    if (*manager == nullptr) {
+    if (*manager == nullptr)
         return fail("the FBX manager cannot be created");
-    }
     *scene = fbxsdk::FbxScene::Create(*manager, "");
     return succeed();
 }
@@ -135,9 +128,8 @@ bool FbxSdk::destroySdkObjects(fbxsdk::FbxManager** manager) {
 fbxsdk::FbxScene* FbxSdk::getScene() const { return mScene; }
 
 bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, const std::string& fileName) {
-    if (manager == nullptr || scene == nullptr) {
+    if (manager == nullptr || scene == nullptr)
         return fail(fileName + ": no scene to load it into");
-    }
     const detail::TimeModeScope timeMode; // an import leaves the file's
     fbxsdk::FbxImporter* importer = fbxsdk::FbxImporter::Create(manager, "");
     if (!importer->Initialize(fileName.c_str(), /*pFileFormat: detect*/ -1, /*pIOSettings*/ nullptr)) {
@@ -146,9 +138,8 @@ bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, con
     }
     if (importer->IsFBX()) {
         const int takeCount = importer->GetAnimStackCount();
-        for (int i = 0; i < takeCount; ++i) {
+        for (int i = 0; i < takeCount; ++i)
             static_cast<void>(importer->GetTakeInfo(i));
-        }
         createImportSettings(manager);
     }
     const bool imported = importer->Import(scene, /*pNonBlocking*/ false);
@@ -161,20 +152,17 @@ bool FbxSdk::loadScene(fbxsdk::FbxManager* manager, fbxsdk::FbxScene* scene, con
 
 bool FbxSdk::loadScene(const std::string& fileName, bool convertGeometry) {
     const detail::CallScope call;
-    if (!mInitialized) {
+    if (!mInitialized)
         return fail(fileName + ": the FBX manager is not initialised");
-    }
-    if (!loadScene(mManager, mScene, fileName)) {
+    if (!loadScene(mManager, mScene, fileName))
         return false;
-    }
     const bool converted = detail::failOnFault(fileName, [&] {
         detail::convertToCentimetres(*mScene);
         detail::convertToYUp(*mScene);
         return !convertGeometry || convertNurbsAndPatchRecursive(mManager, mScene->GetRootNode());
     });
-    if (!converted) {
+    if (!converted)
         return false;
-    }
     initCreateAnimationStack();
     mFileName = fileName;
     return succeed();
@@ -201,17 +189,15 @@ bool FbxSdk::convertNurbsAndPatchRecursive(fbxsdk::FbxManager* manager, fbxsdk::
 
 // kept: the first stack is read, whatever the options' stack name
 void FbxSdk::initCreateAnimationStack() {
-    if (mScene == nullptr) {
+    if (mScene == nullptr)
         return;
-    }
     mCurrentAnimStack = mScene->GetSrcObjectCount(isStack()) > 0
                             ? stackAt(*mScene, 0)
                             : fbxsdk::FbxAnimStack::Create(mScene, kDefaultAnimationStackName.c_str());
     evaluateStack(*mScene, mCurrentAnimStack);
     const auto isLayer = fbxsdk::FbxCriteria::ObjectType(fbxsdk::FbxAnimLayer::ClassId);
-    if (mCurrentAnimStack != nullptr && mCurrentAnimStack->GetSrcObjectCount(isLayer) == 0) {
+    if (mCurrentAnimStack != nullptr && mCurrentAnimStack->GetSrcObjectCount(isLayer) == 0)
         mCurrentAnimStack->AddMember(fbxsdk::FbxAnimLayer::Create(mScene, kDefaultLayerName));
-    }
 }
 
 bool FbxSdk::setCurrentAnimationStack(const std::string& name) {
@@ -229,23 +215,19 @@ bool FbxSdk::setCurrentAnimationStack(const std::string& name) {
 
 bool FbxSdk::getAnimationStackNames(std::vector<std::string>& names) {
     names.clear();
-    if (mScene == nullptr) {
+    if (mScene == nullptr)
         return fail("no scene is loaded");
-    }
     const int count = mScene->GetSrcObjectCount(isStack());
-    for (int i = 0; i < count; ++i) {
-        if (const fbxsdk::FbxAnimStack* stack = stackAt(*mScene, i)) {
+    for (int i = 0; i < count; ++i)
+        if (const fbxsdk::FbxAnimStack* stack = stackAt(*mScene, i))
             names.emplace_back(stack->GetName());
-        }
-    }
     return succeed();
 }
 
 bool FbxSdk::getGlobalAnimationStackTime(TnFbxTime& time, float frame, bool useSampleFPS, float sampleFPS) {
     time.initTime();
-    if (!mInitialized || mScene == nullptr || mCurrentAnimStack == nullptr) {
+    if (!mInitialized || mScene == nullptr || mCurrentAnimStack == nullptr)
         return fail("no scene is loaded");
-    }
     const detail::TimeModeScope timeMode(mScene);
     const fbxsdk::FbxTimeSpan span = mCurrentAnimStack->GetLocalTimeSpan();
     const fbxsdk::FbxTime::EMode mode = mScene->GetGlobalSettings().GetTimeMode();

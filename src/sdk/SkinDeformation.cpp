@@ -34,23 +34,20 @@ constexpr std::size_t kBlockPoints = 1024;
 
 void scaleElements(Matrix& matrix, double factor) {
     double* elements = matrix;
-    for (int i = 0; i < kMatrixElements; ++i) {
+    for (int i = 0; i < kMatrixElements; ++i)
         elements[i] *= factor;
-    }
 }
 
 void addElements(Matrix& matrix, const Matrix& other) {
     double* elements = matrix;
     const double* added = other;
-    for (int i = 0; i < kMatrixElements; ++i) {
+    for (int i = 0; i < kMatrixElements; ++i)
         elements[i] += added[i];
-    }
 }
 
 void addToDiagonal(Matrix& matrix, double value) {
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         matrix[i][i] += value;
-    }
 }
 
 /// The mode of the mesh's first cluster applies to all of them.
@@ -86,15 +83,13 @@ public:
     public:
         Motion() = default;
         explicit Motion(const Matrix& matrix) {
-            for (std::size_t i = 0; i < mElements.size(); ++i) {
+            for (std::size_t i = 0; i < mElements.size(); ++i)
                 mElements[i] = matrix.Get(static_cast<int>(i / 3), static_cast<int>(i % 3));
-            }
         }
 
         void add(const Motion& other, double weight) {
-            for (std::size_t i = 0; i < mElements.size(); ++i) {
+            for (std::size_t i = 0; i < mElements.size(); ++i)
                 mElements[i] += other.mElements[i] * weight;
-            }
         }
 
         /// As the whole matrix's MultT does, sum by sum.
@@ -117,16 +112,14 @@ public:
 
     /// kept: a total of exactly the threshold leaves the point unchanged, a weight of exactly the threshold counts
     void apply(Cluster::ELinkMode mode, Point& point) const {
-        if (!(std::fabs(mWeight) > kWeightThreshold)) {
+        if (!(std::fabs(mWeight) > kWeightThreshold))
             return;
-        }
         const Point source = point;
         point = mMotion.apply(source);
-        if (mode == Cluster::eNormalize) {
+        if (mode == Cluster::eNormalize)
             point /= mWeight;
-        } else if (mode == Cluster::eTotalOne) {
+        else if (mode == Cluster::eTotalOne)
             point += source * (1.0 - mWeight);
-        }
     }
 
 private:
@@ -148,9 +141,8 @@ public:
     }
 
     void apply(Cluster::ELinkMode /*mode*/, Point& point) const {
-        if (mMoved) {
+        if (mMoved)
             point = mMotion.MultT(point);
-        }
     }
 
 private:
@@ -184,9 +176,8 @@ struct Influences {
             const double weight = weights[next];
             // a negative index becomes a large one
             const std::size_t point = static_cast<std::size_t>(indices[next]) - firstPoint;
-            if (!(std::fabs(weight) < kWeightThreshold) && point < sums.size()) {
+            if (!(std::fabs(weight) < kWeightThreshold) && point < sums.size())
                 sums[point].add(moved, weight);
-            }
         }
     }
 };
@@ -205,12 +196,10 @@ void deform(std::vector<Influences<Sum>>& clusters, Cluster::ELinkMode mode, std
         const std::size_t end = std::min(first + blockSize, pointCount);
         sums.assign(end - first, Sum());
         const int lastIndex = end < pointCount ? static_cast<int>(end - 1) : std::numeric_limits<int>::max();
-        for (Influences<Sum>& cluster : clusters) {
+        for (Influences<Sum>& cluster : clusters)
             cluster.addUpTo(lastIndex, first, sums);
-        }
-        for (std::size_t i = first; i < end; ++i) {
+        for (std::size_t i = first; i < end; ++i)
             sums[i - first].apply(mode, points[i]);
-        }
     }
 }
 
@@ -219,9 +208,8 @@ void deformBySkins(FbxSdk& sdk, const Matrix& globalPosition, fbxsdk::FbxMesh& m
                    const fbxsdk::FbxTime& time, Point* points) {
     std::vector<Influences<Sum>> clusters;
     detail::forEachCluster(mesh, [&](Cluster& cluster) {
-        if (fbxsdk::FbxNode* link = cluster.GetLink()) {
+        if (fbxsdk::FbxNode* link = cluster.GetLink())
             clusters.emplace_back(cluster, vertexTransform(sdk, globalPosition, mesh, cluster, *link, mode, time));
-        }
     });
     deform(clusters, mode, static_cast<std::size_t>(mesh.GetControlPointsCount()), points);
 }
@@ -230,9 +218,8 @@ void deformBySkins(FbxSdk& sdk, const Matrix& globalPosition, fbxsdk::FbxMesh& m
 
 void FbxSdk::computeClusterDeformation(fbxsdk::FbxAMatrix& globalPosition, fbxsdk::FbxMesh* mesh, fbxsdk::FbxTime& time,
                                        fbxsdk::FbxVector4* points) {
-    if (mesh == nullptr || points == nullptr) {
+    if (mesh == nullptr || points == nullptr)
         return;
-    }
     const Cluster::ELinkMode mode = linkModeOf(*mesh);
     const auto deformInMode = mode == Cluster::eAdditive ? deformBySkins<ChainedSum> : deformBySkins<BlendedSum>;
     deformInMode(*this, globalPosition, *mesh, mode, time, points);

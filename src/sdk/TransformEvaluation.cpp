@@ -48,9 +48,8 @@ struct EulerAngles {
 EulerAngles eulerFromMatrix(const fbxsdk::FbxAMatrix& matrix) {
     const auto m = [&matrix](int row, int column) { return toFloat(matrix.Get(row, column)); };
     const float s = m(2, 1);
-    if (std::fabs(std::fabs(s) - 1.0f) < kGimbalTolerance) {
+    if (std::fabs(std::fabs(s) - 1.0f) < kGimbalTolerance)
         return {std::fabs(s + 1.0f) < kGimbalTolerance ? kHalfPi : -kHalfPi, 0.0f, std::atan2(-m(1, 0), m(0, 0))};
-    }
     const float h = std::sqrt(m(2, 2) * m(2, 2) + m(2, 0) * m(2, 0));
     // kept: a vanishing h is its own factor; the result of atan2 is the same as long as the factor is positive
     const float k = std::fabs(h) > kGimbalTolerance ? 1.0f / h : h;
@@ -61,9 +60,8 @@ EulerAngles eulerFromMatrix(const fbxsdk::FbxAMatrix& matrix) {
 
 bool FbxSdk::getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float sampleFPS, fbxsdk::FbxNode* node,
                           TnFbxTransform& transform, fbxsdk::FbxAMatrix& geometric) {
-    if (node == nullptr) {
+    if (node == nullptr)
         return fail("no node to read a transform from");
-    }
     const detail::ReadScope scope(*this);
     transform.setName(node->GetName());
     if (!global) {
@@ -101,9 +99,8 @@ bool FbxSdk::setTransformValues(fbxsdk::FbxNode* node, TnFbxTime& time, bool use
     const detail::ReadScope scope(*this);
     if (node != nullptr && transform != nullptr) {
         PropertySampler properties = sampler(time, useSampleFPS, sampleFPS);
-        for (const LocalRow& row : kLocalChannels) {
+        for (const LocalRow& row : kLocalChannels)
             properties.readIntoTransform(*transform, row.firstChannel, node->*row.property);
-        }
     }
     return scope.finish(true);
 }
@@ -116,28 +113,24 @@ bool FbxSdk::getGlobalPositionRotationScaleValues(TnFbxTime& time, fbxsdk::FbxNo
                                                   std::vector<float>& scaleZ) {
     const std::array<std::vector<float>*, 9> channels = {&positionX, &positionY, &positionZ, &rotationX, &rotationY,
                                                          &rotationZ, &scaleX,    &scaleY,    &scaleZ};
-    for (std::vector<float>* channel : channels) {
+    for (std::vector<float>* channel : channels)
         channel->clear();
-    }
-    if (node == nullptr || time.getStartFrame() > time.getEndFrame()) {
+    if (node == nullptr || time.getStartFrame() > time.getEndFrame())
         return false;
-    }
 
     const detail::ReadScope scope(*this);
     // One float per frame and channel, whether they change or not.
     const detail::SampleRange frames = {time.getStartFrame(), time.getEndFrame()};
-    if (!mSamples->take(frames, time.getFrameRate(), channels.size())) {
+    if (!mSamples->take(frames, time.getFrameRate(), channels.size()))
         return scope.finish(true);
-    }
     detail::MemoryAccount unlimited;
     detail::SampleAccount account(unlimited);
     detail::GlobalSampler globals(*this, time);
     globals.add(*node, geometric);
     globals.sample(account);
     detail::GlobalRuns& runs = *globals.take(*node, geometric);
-    for (std::size_t i = 0; i < channels.size(); ++i) {
+    for (std::size_t i = 0; i < channels.size(); ++i)
         *channels[i] = runs[i].takeAll();
-    }
     return true;
 }
 
@@ -179,18 +172,15 @@ fbxsdk::FbxAMatrix FbxSdk::getGeometry(fbxsdk::FbxNode* node) {
 
 bool FbxSdk::getDefaultAnimTransformation(fbxsdk::FbxNode* node, fbxsdk::FbxVector4& translation,
                                           fbxsdk::FbxVector4& rotation, fbxsdk::FbxVector4& scaling) {
-    if (node == nullptr || mCurrentAnimStack == nullptr) {
+    if (node == nullptr || mCurrentAnimStack == nullptr)
         return fail("no node or no animation stack to read curves from");
-    }
     const std::array<fbxsdk::FbxVector4*, 3> vectors = {&translation, &rotation, &scaling};
     for (fbxsdk::FbxAnimLayer* layer : detail::layersOf(mCurrentAnimStack)) {
         for (std::size_t row = 0; row < vectors.size(); ++row) {
             auto& property = node->*kLocalChannels[row].property;
-            for (int i = 0; i < 3; ++i) {
-                if (auto* curve = property.GetCurve(layer, property.GetName(), detail::kComponents[i], false)) {
+            for (int i = 0; i < 3; ++i)
+                if (auto* curve = property.GetCurve(layer, property.GetName(), detail::kComponents[i], false))
                     (*vectors[row])[i] = static_cast<double>(curve->GetValue());
-                }
-            }
         }
     }
     return succeed();

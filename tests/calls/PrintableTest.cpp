@@ -16,9 +16,8 @@ namespace {
 using detail::printable;
 
 TEST(Printable, LeavesOrdinaryTextAsItIs) {
-    for (const char* text : {"", "pCube1", "Würfel \xE7\xAB\x8B\xE6\x96\xB9 \xF0\x9F\x8E\xA5", "a\\b\"c"}) {
+    for (const char* text : {"", "pCube1", "Würfel \xE7\xAB\x8B\xE6\x96\xB9 \xF0\x9F\x8E\xA5", "a\\b\"c"})
         EXPECT_EQ(printable(text), text);
-    }
 }
 
 TEST(Printable, EscapesWhatATerminalObeys) {

@@ -49,7 +49,7 @@ struct Options {
 std::span<const Row> rowsOf(const Options& options) { return options.faithful ? faithfulRows() : rows(); }
 
 bool parse(int argc, char** argv, Options& options) {
-    for (int i = 1; i < argc; ++i) {
+    for (int i = 1; i < argc; ++i)
         if (std::strcmp(argv[i], "--update") == 0)
             options.update = true;
         else if (std::strcmp(argv[i], "--quiet") == 0)
@@ -64,7 +64,6 @@ bool parse(int argc, char** argv, Options& options) {
             options.converted.emplace_back(argv[++i]);
         else
             return false;
-    }
     return true;
 }
 
@@ -79,9 +78,8 @@ void record(const Row& row, const CorpusFile& file, const Findings& findings, Re
 }
 
 void printDifferences(const Row& row, const CorpusFile& file, const Findings& findings) {
-    for (const std::string& difference : findings.differences()) {
+    for (const std::string& difference : findings.differences())
         std::printf("%s: %s: %s\n", row.name, file.name.c_str(), difference.c_str());
-    }
     const auto untold =
         findings.compared() - findings.agreeing() - static_cast<std::int64_t>(findings.differences().size());
     if (untold > 0)
@@ -204,10 +202,9 @@ int runThrough(const Options& options, const std::filesystem::path& corpus) {
     std::vector<std::unique_ptr<CopiedCorpus>> forms;
     for (const std::string& form : options.through)
         forms.push_back(std::make_unique<CopiedCorpus>(corpus, form));
-    for (const CorpusFile& file : listCorpus(corpus)) {
+    for (const CorpusFile& file : listCorpus(corpus))
         if (options.file.empty() || file.name == options.file)
             checkCopies(file, options, forms);
-    }
     bool failed = false;
     for (const std::unique_ptr<CopiedCorpus>& form : forms)
         failed = judgeRoundTrip(form->comparison, options) || failed;
@@ -265,10 +262,9 @@ int runConverted(const Options& options, const std::filesystem::path& corpus) {
     std::vector<std::unique_ptr<ConvertedForms>> forms;
     for (const std::string& form : options.converted)
         forms.push_back(std::make_unique<ConvertedForms>(form));
-    for (const CorpusFile& file : listCorpus(corpus)) {
+    for (const CorpusFile& file : listCorpus(corpus))
         if (options.file.empty() || file.name == options.file)
             checkConversions(file, options, forms);
-    }
     bool failed = false;
     for (const std::unique_ptr<ConvertedForms>& form : forms)
         failed = judgeRoundTrip(form->comparison, options) || failed;

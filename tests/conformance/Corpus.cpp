@@ -27,10 +27,9 @@ std::string featureOf(const std::string& fileName) {
 
 std::vector<fs::path> filesBelow(const fs::path& folder, const std::string& extension) {
     std::vector<fs::path> files;
-    for (const fs::directory_entry& entry : fs::recursive_directory_iterator(folder)) {
+    for (const fs::directory_entry& entry : fs::recursive_directory_iterator(folder))
         if (entry.is_regular_file() && entry.path().extension() == extension)
             files.push_back(entry.path());
-    }
     return files;
 }
 
@@ -59,9 +58,8 @@ void addWavefrontFiles(const fs::path& folder, std::vector<CorpusFile>& files) {
 } // namespace
 
 std::optional<fs::path> findCorpus() {
-    if (const char* named = std::getenv("TARNELL_CORPUS")) {
+    if (const char* named = std::getenv("TARNELL_CORPUS"))
         return holdsCorpus(named) ? std::optional<fs::path>(named) : std::nullopt;
-    }
     const fs::path beside = fs::path(TARNELL_PROJECT_FOLDER).parent_path() / "shared" / "corpus";
     return holdsCorpus(beside) ? std::optional<fs::path>(beside) : std::nullopt;
 }

@@ -22,11 +22,9 @@ void checkFiles(const std::string& row, const ExpectedRow& expected, const RowRe
         else if (known->second.empty())
             violations.push_back(row + ": " + file + " differs without a stated reason");
     }
-    for (const auto& [file, reason] : expected.reasons) {
-        if (!result.differingFiles.contains(file)) {
+    for (const auto& [file, reason] : expected.reasons)
+        if (!result.differingFiles.contains(file))
             violations.push_back(row + ": " + file + " agrees now: remove it from the list");
-        }
-    }
 }
 
 } // namespace
@@ -40,10 +38,9 @@ Expectations::Expectations(const std::filesystem::path& path) : mPath(path) {
         ExpectedRow& row = mRows[name];
         value.at("compared").get_to(row.compared);
         value.at("agreeing").get_to(row.agreeing);
-        for (const json& group : value.at("differing")) {
+        for (const json& group : value.at("differing"))
             for (const json& differing : group.at("files"))
                 row.reasons[differing] = group.at("reason");
-        }
     }
 }
 

@@ -162,15 +162,15 @@ FbxAMatrix matrixOf(const TnFbxTransform& object, const ValueOf& value) {
 }
 
 FbxAMatrix staticMatrixOf(const TnFbxTransform& object) {
-    return matrixOf(object, [&object](auto channel) { return static_cast<double>(object.getTransformValue(channel)); });
+    return matrixOf(
+        object, [&object](auto channel) { return static_cast<double>(object.getTransformValue(channel)); });
 }
 
 FbxAMatrix fromMatrix12(const Matrix12& numbers) {
     FbxAMatrix matrix;
-    for (int row = 0; row < 4; ++row) {
+    for (int row = 0; row < 4; ++row)
         for (int column = 0; column < 3; ++column)
             matrix[row][column] = numbers[static_cast<std::size_t>(3 * row + column)];
-    }
     return matrix;
 }
 
@@ -184,11 +184,10 @@ bool sameMatrix(const FbxAMatrix& actual, const FbxAMatrix& expected, double siz
         }
     }
     for (int row = 0; row < 4; ++row) {
-        for (int column = 0; column < 3; ++column) {
+        for (int column = 0; column < 3; ++column)
             if (!closeTo(actual.Get(row, column), expected.Get(row, column), kHandedOutTolerance,
                          row < 3 ? axes : position))
                 return false;
-        }
     }
     return true;
 }
@@ -200,10 +199,12 @@ std::string printedMatrix(const FbxAMatrix& matrix) {
 
 void compareMatrices(const ReferenceNode& node, double frame, const FbxAMatrix& actual, const FbxAMatrix& expected,
                      double sizeOfScene, Findings& findings) {
-    findings.compare(sameMatrix(actual, expected, sizeOfScene), [&] {
-        return "\"" + node.name + "\" at frame " + printed(frame) + ": " + printedMatrix(actual) + " instead of " +
-               printedMatrix(expected);
-    });
+    findings.compare(
+        sameMatrix(actual, expected, sizeOfScene),
+        [&] {
+            return "\"" + node.name + "\" at frame " + printed(frame) + ": " + printedMatrix(actual) + " instead of " +
+                   printedMatrix(expected);
+        });
 }
 
 double sizeOf(const FbxAMatrix& matrix) {
@@ -478,65 +479,73 @@ void checkFaithfulLenses(LoadedFile& file, Findings& findings) {
                  {value(TnFbxCamera::kFbxCameraFieldOfViewX), angleOf(width, focalLength)},
                  {value(TnFbxCamera::kFbxCameraFieldOfViewY), angleOf(height, focalLength)}}};
             for (const auto& [actual, wanted] : pairs) {
-                findings.compare(closeTo(actual, wanted, kHandedOutTolerance), [&, a = actual, w = wanted] {
-                    return "\"" + expected.name + "\" at frame " + printed(reference.frames[f]) + ": " + printed(a) +
-                           " instead of " + printed(w);
-                });
+                findings.compare(
+                    closeTo(actual, wanted, kHandedOutTolerance),
+                    [&, a = actual, w = wanted] {
+                        return "\"" + expected.name + "\" at frame " + printed(reference.frames[f]) + ": " +
+                               printed(a) + " instead of " + printed(w);
+                    });
             }
         }
     }
 }
 
 void checkFaithfulPoints(LoadedFile& file, Findings& findings) {
-    forEachMesh(file, findings,
-                [&](std::size_t f, const ReferenceNode& node, const FaithfulNode& expected, const TnFbxMesh& mesh,
-                    fbxsdk::FbxMesh* /*source*/) {
-                    const std::vector<double>& points = expected.points[f];
-                    const double largest = largestOf(points);
-                    for (std::size_t i = 0; i < points.size() / 3; ++i) {
-                        std::array<float, 3> point{};
-                        const int index = static_cast<int>(i) * expected.pointStep;
-                        bool same = mesh.getControlPoint(index, point[0], point[1], point[2]);
-                        for (std::size_t axis = 0; axis < 3; ++axis)
-                            same = same && closeTo(static_cast<double>(point[axis]), points[3 * i + axis],
-                                                   kHandedOutTolerance, largest);
-                        findings.compare(same, [&] {
-                            const std::array<double, 3> actual = {static_cast<double>(point[0]),
-                                                                  static_cast<double>(point[1]),
-                                                                  static_cast<double>(point[2])};
-                            return "\"" + node.name + "\" at frame " + printed(file.reference().frames[f]) + " point " +
-                                   std::to_string(index) + ": " + printed(actual.data(), 3) + " instead of " +
-                                   printed(&points[3 * i], 3);
-                        });
-                    }
-                });
+    forEachMesh(
+        file, findings,
+        [&](std::size_t f, const ReferenceNode& node, const FaithfulNode& expected, const TnFbxMesh& mesh,
+            fbxsdk::FbxMesh* /*source*/) {
+            const std::vector<double>& points = expected.points[f];
+            const double largest = largestOf(points);
+            for (std::size_t i = 0; i < points.size() / 3; ++i) {
+                std::array<float, 3> point{};
+                const int index = static_cast<int>(i) * expected.pointStep;
+                bool same = mesh.getControlPoint(index, point[0], point[1], point[2]);
+                for (std::size_t axis = 0; axis < 3; ++axis)
+                    same = same && closeTo(static_cast<double>(point[axis]), points[3 * i + axis], kHandedOutTolerance,
+                                           largest);
+                findings.compare(
+                    same,
+                    [&] {
+                        const std::array<double, 3> actual = {static_cast<double>(point[0]),
+                                                              static_cast<double>(point[1]),
+                                                              static_cast<double>(point[2])};
+                        return "\"" + node.name + "\" at frame " + printed(file.reference().frames[f]) + " point " +
+                               std::to_string(index) + ": " + printed(actual.data(), 3) + " instead of " +
+                               printed(&points[3 * i], 3);
+                    });
+            }
+        });
 }
 
 void checkFaithfulNormals(LoadedFile& file, Findings& findings) {
-    forEachMesh(file, findings,
-                [&](std::size_t f, const ReferenceNode& node, const FaithfulNode& expected, const TnFbxMesh& mesh,
-                    fbxsdk::FbxMesh* source) {
-                    if (f >= expected.normals.size() || source == nullptr)
-                        return;
-                    const std::vector<int> places = placesOfCorners(*source, mesh);
-                    const std::vector<double>& normals = expected.normals[f];
-                    for (std::size_t i = 0; i < normals.size() / 3; ++i) {
-                        std::array<float, 3> normal{};
-                        const std::size_t corner = i * static_cast<std::size_t>(expected.normalStep);
-                        bool same = corner < places.size() && mesh.getValidNormals() &&
-                                    mesh.getNormal(places[corner], normal[0], normal[1], normal[2]);
-                        for (std::size_t axis = 0; axis < 3; ++axis)
-                            same = same && closeTo(static_cast<double>(normal[axis]), normals[3 * i + axis], 1e-4);
-                        findings.compare(same, [&] {
-                            const std::array<double, 3> actual = {static_cast<double>(normal[0]),
-                                                                  static_cast<double>(normal[1]),
-                                                                  static_cast<double>(normal[2])};
-                            return "\"" + node.name + "\" at frame " + printed(file.reference().frames[f]) +
-                                   " corner " + std::to_string(corner) + ": " + printed(actual.data(), 3) +
-                                   " instead of " + printed(&normals[3 * i], 3);
-                        });
-                    }
-                });
+    forEachMesh(
+        file, findings,
+        [&](std::size_t f, const ReferenceNode& node, const FaithfulNode& expected, const TnFbxMesh& mesh,
+            fbxsdk::FbxMesh* source) {
+            if (f >= expected.normals.size() || source == nullptr)
+                return;
+            const std::vector<int> places = placesOfCorners(*source, mesh);
+            const std::vector<double>& normals = expected.normals[f];
+            for (std::size_t i = 0; i < normals.size() / 3; ++i) {
+                std::array<float, 3> normal{};
+                const std::size_t corner = i * static_cast<std::size_t>(expected.normalStep);
+                bool same = corner < places.size() && mesh.getValidNormals() &&
+                            mesh.getNormal(places[corner], normal[0], normal[1], normal[2]);
+                for (std::size_t axis = 0; axis < 3; ++axis)
+                    same = same && closeTo(static_cast<double>(normal[axis]), normals[3 * i + axis], 1e-4);
+                findings.compare(
+                    same,
+                    [&] {
+                        const std::array<double, 3> actual = {static_cast<double>(normal[0]),
+                                                              static_cast<double>(normal[1]),
+                                                              static_cast<double>(normal[2])};
+                        return "\"" + node.name + "\" at frame " + printed(file.reference().frames[f]) + " corner " +
+                               std::to_string(corner) + ": " + printed(actual.data(), 3) + " instead of " +
+                               printed(&normals[3 * i], 3);
+                    });
+            }
+        });
 }
 
 void checkFaithfulWavefront(LoadedFile& file, Findings& findings) {

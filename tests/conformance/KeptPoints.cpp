@@ -61,10 +61,9 @@ std::set<int> skinnedPoints(FbxMesh& mesh) {
     }
     constexpr double kNoWeight = 1e-5;
     std::set<int> result;
-    for (const auto& [point, weight] : weights) {
+    for (const auto& [point, weight] : weights)
         if (std::abs(weight) > kNoWeight)
             result.insert(point);
-    }
     return result;
 }
 

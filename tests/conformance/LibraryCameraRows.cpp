@@ -236,10 +236,9 @@ void compareCamera(LoadedFile& file, std::size_t nodeIndex, const TnFbxCamera& c
     compareCommonValues(file.reference(), node, camera, findings);
     compareLens(node, camera, findings);
     compareFilmOffset(node, camera, *file.nodeOf(nodeIndex)->node->GetNodeAttribute(), findings);
-    for (std::size_t f = 0; f < node.world.size(); ++f) {
+    for (std::size_t f = 0; f < node.world.size(); ++f)
         if (knowsFrame(camera, file.reference(), file.reference().frames[f]))
             comparePlacement(file, nodeIndex, camera, f, findings);
-    }
 }
 
 void compareProducer(const Reference& reference, const ReferenceNode& node, const TnFbxCamera& camera,

@@ -55,10 +55,12 @@ bool hasKind(const Reference& reference, const std::string& kind) {
 
 void compareMatrices(const Reference& reference, const ReferenceNode& node, std::size_t frameIndex,
                      const Matrix12& actual, const Matrix12& expected, Findings& findings) {
-    findings.compare(sameMatrix(actual, expected, kHandedOutTolerance), [&] {
-        return "\"" + node.name + "\" at frame " + printed(reference.frames[frameIndex]) + ": " +
-               printed(actual.data(), actual.size()) + " instead of " + printed(expected.data(), expected.size());
-    });
+    findings.compare(
+        sameMatrix(actual, expected, kHandedOutTolerance),
+        [&] {
+            return "\"" + node.name + "\" at frame " + printed(reference.frames[frameIndex]) + ": " +
+                   printed(actual.data(), actual.size()) + " instead of " + printed(expected.data(), expected.size());
+        });
 }
 
 Matrix12 contentInWorld(const ReferenceNode& node, std::size_t frameIndex, const Matrix12& turn) {

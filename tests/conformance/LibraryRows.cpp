@@ -37,7 +37,8 @@ constexpr TransformChannel kTransformChannels[] = {
 };
 
 bool isConstant(const std::vector<double>& values) {
-    return std::ranges::all_of(values, [&](double value) { return closeTo(value, values[0], kHandedOutTolerance); });
+    return std::ranges::all_of(
+        values, [&](double value) { return closeTo(value, values[0], kHandedOutTolerance); });
 }
 
 void compareSamples(const Reference& reference, const ReferenceNode& node, const TnFbxTransform& transform,
@@ -91,9 +92,8 @@ void compareMeshPoints(const ReferenceNode& node, const TnFbxMesh& mesh, Finding
         const Point local{static_cast<double>(x), static_cast<double>(y), static_cast<double>(z)};
         const Point placed = moved(node.world[0], moved(node.geometric, local));
         bool same = has;
-        for (std::size_t axis = 0; axis < placed.size(); ++axis) {
+        for (std::size_t axis = 0; axis < placed.size(); ++axis)
             same = same && closeTo(placed[axis], expected[3 * i + axis], kHandedOutTolerance, largest);
-        }
         findings.compare(same, [&] {
             return "\"" + node.name + "\" point " + std::to_string(index) + ": " + printed(placed.data(), 3) +
                    " instead of " + printed(&expected[3 * i], 3);

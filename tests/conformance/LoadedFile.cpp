@@ -190,9 +190,8 @@ void LoadedFile::markMovedNodes() {
 
 void LoadedFile::normalise() {
     FbxGlobalSettings& settings = mScene->GetGlobalSettings();
-    if (settings.GetSystemUnit().GetScaleFactor() - 1.0 != 0.0) {
+    if (settings.GetSystemUnit().GetScaleFactor() - 1.0 != 0.0)
         FbxSystemUnit(1.0, 1.0).ConvertScene(mScene, FbxSystemUnit::DefaultConversionOptions);
-    }
     const FbxAxisSystem target(FbxAxisSystem::eYAxis, FbxAxisSystem::eParityOdd, FbxAxisSystem::eRightHanded);
     if (settings.GetAxisSystem() != target)
         target.ConvertScene(mScene);
@@ -217,10 +216,9 @@ void LoadedFile::matchReference() {
         if (const auto found = byPath.find(referencePaths.back()); found != byPath.end()) {
             mNodeOfReference[i] = found->second;
         } else if (node.parent < 0) {
-            for (const SceneNode& producer : mProducers) {
+            for (const SceneNode& producer : mProducers)
                 if (node.name == producer.name)
                     mNodeOfReference[i] = &producer;
-            }
         }
     }
 }
@@ -290,11 +288,9 @@ FbxAMatrix geometricMatrix(const FbxNode& node) {
 
 Matrix12 asMatrix12(const FbxAMatrix& matrix) {
     Matrix12 numbers{};
-    for (int row = 0; row < 4; ++row) {
-        for (int column = 0; column < 3; ++column) {
+    for (int row = 0; row < 4; ++row)
+        for (int column = 0; column < 3; ++column)
             numbers[static_cast<std::size_t>(3 * row + column)] = matrix.Get(row, column);
-        }
-    }
     return numbers;
 }
 

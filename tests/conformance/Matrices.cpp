@@ -72,10 +72,9 @@ std::optional<Matrix12> inverse(const Matrix12& matrix) {
     if (determinant == 0)
         return std::nullopt;
     Matrix12 result{};
-    for (std::size_t i = 0; i < 3; ++i) {
+    for (std::size_t i = 0; i < 3; ++i)
         for (std::size_t j = 0; j < 3; ++j)
             result[3 * i + j] = columns[j][i] / determinant;
-    }
     const Point back = linear(result, rowOf(matrix, 3));
     for (std::size_t j = 0; j < back.size(); ++j)
         result[kAxes + j] = -back[j];
@@ -93,10 +92,9 @@ Matrix12 shifted(const Point& offset) { return {1, 0, 0, 0, 1, 0, 0, 0, 1, offse
 bool sameMatrix(const Matrix12& actual, const Matrix12& expected, double tolerance) {
     const double axes = largest(expected, 0, kAxes);
     const double translation = largest(expected, kAxes, expected.size());
-    for (std::size_t i = 0; i < expected.size(); ++i) {
+    for (std::size_t i = 0; i < expected.size(); ++i)
         if (!closeTo(actual[i], expected[i], tolerance, i < kAxes ? axes : translation))
             return false;
-    }
     return true;
 }
 

@@ -40,9 +40,8 @@ bool hasBlendShapes(FbxMesh& mesh) { return mesh.GetDeformerCount(FbxDeformer::e
 std::vector<Point> worldPoints(LoadedFile& file, FbxNode& node, FbxMesh& mesh, FbxTime time) {
     FbxAMatrix world = worldMatrix(node, time);
     const auto count = static_cast<std::size_t>(mesh.GetControlPointsCount());
-    if (!file.sdk().getDeformation(&mesh)) {
+    if (!file.sdk().getDeformation(&mesh))
         return transformed(world * geometricMatrix(node), {mesh.GetControlPoints(), count});
-    }
     FbxVector4* deformed = nullptr;
     file.sdk().getDeformedControlPoints(&node, &mesh, time, world, &deformed);
     const std::unique_ptr<FbxVector4[]> owner(deformed);

@@ -134,9 +134,9 @@ void checkMeshTopology(LoadedFile& file, Findings& findings) {
             });
         }
         for (const FlagRow& row : kFlags) {
-            findings.compare(mesh && actual.*row.member == expected.*row.member, [&] {
-                return "\"" + node.name + "\" has " + (actual.*row.member ? "" : "no ") + row.name;
-            });
+            findings.compare(
+                mesh && actual.*row.member == expected.*row.member,
+                [&] { return "\"" + node.name + "\" has " + (actual.*row.member ? "" : "no ") + row.name; });
         }
     }
 }

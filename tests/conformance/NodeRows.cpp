@@ -36,10 +36,9 @@ std::string kindOf(const FbxNode& node) {
     const FbxNodeAttribute* attribute = node.GetNodeAttribute();
     if (attribute == nullptr)
         return "none";
-    for (const KindRow& row : kKinds) {
+    for (const KindRow& row : kKinds)
         if (row.type == attribute->GetAttributeType())
             return row.kind;
-    }
     return "other";
 }
 
@@ -68,9 +67,8 @@ std::vector<Description> referenceTree(const LoadedFile& file) {
 
 std::vector<Description> sceneTree(const LoadedFile& file) {
     std::vector<Description> tree;
-    for (const SceneNode& entry : file.nodes()) {
+    for (const SceneNode& entry : file.nodes())
         tree.push_back({entry.name, kindOf(*entry.node), entry.parent});
-    }
     return tree;
 }
 

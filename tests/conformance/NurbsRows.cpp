@@ -132,7 +132,8 @@ private:
 
 /// Groups are named after the node, or after its shape.
 bool isOf(const WavefrontBlock& block, const std::string& nodeName) {
-    return std::ranges::any_of(block.names, [&](const std::string& name) { return name.starts_with(nodeName); });
+    return std::ranges::any_of(
+        block.names, [&](const std::string& name) { return name.starts_with(nodeName); });
 }
 
 void comparePoint(const Surface& surface, const Point& point, double tolerance, const char* whose, Findings& findings) {

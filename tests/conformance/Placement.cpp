@@ -40,10 +40,9 @@ Matrix12 rebuilt(const Placement& placement) {
 Placement placementBesideOrigin(const Matrix12& matrix) {
     Rows n = rowsOf(matrix);
     const Point lengths = signedLengths(n);
-    for (std::size_t i = 0; i < n.size(); ++i) {
+    for (std::size_t i = 0; i < n.size(); ++i)
         for (double& number : n[i])
             number /= lengths[i];
-    }
     constexpr double kGimbalLock = 16 * 1.1920929e-7;
     const double root = std::hypot(n[0][0], n[0][1]);
     const double y = std::atan2(-n[0][2], root);

@@ -20,10 +20,9 @@ struct ManagerDeleter {
 
 int writerFor(FbxManager& manager, bool ascii) {
     const FbxIOPluginRegistry& registry = *manager.GetIOPluginRegistry();
-    for (int i = 0; i < registry.GetWriterFormatCount(); ++i) {
+    for (int i = 0; i < registry.GetWriterFormatCount(); ++i)
         if (FbxString(registry.GetWriterFormatDescription(i)).Find(ascii ? "ascii" : "binary") >= 0)
             return i;
-    }
     throw std::runtime_error("the registry has no such writer");
 }
 

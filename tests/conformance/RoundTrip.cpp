@@ -43,10 +43,9 @@ void RoundTrip::add(const std::string& file, const Results& before, const Result
 
 std::vector<std::string> RoundTrip::violations() const {
     std::vector<std::string> violations;
-    for (const auto& [row, file] : mWorse) {
+    for (const auto& [row, file] : mWorse)
         if (!mKnown.contains({row, file}))
             violations.push_back(mForm + ": " + row + ": " + file + " is worse than the file it was made of");
-    }
     for (const auto& known : mKnown) {
         if (!mWorse.contains(known.first))
             violations.push_back(mForm + ": " + known.first.first + ": " + known.first.second +

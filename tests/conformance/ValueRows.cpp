@@ -14,10 +14,9 @@ namespace {
 bool same(const std::vector<double>& actual, const std::vector<double>& expected, double tolerance) {
     if (actual.size() != expected.size())
         return false;
-    for (std::size_t i = 0; i < actual.size(); ++i) {
+    for (std::size_t i = 0; i < actual.size(); ++i)
         if (!closeTo(actual[i], expected[i], tolerance))
             return false;
-    }
     return true;
 }
 
@@ -56,10 +55,9 @@ void checkCurves(LoadedFile& file, Findings& findings) {
         const ReferenceNode& node = file.reference().nodes[i];
         const SceneNode* entry = file.nodeOf(i);
         NamedNumbers expected = node.curves;
-        if (entry) {
+        if (entry)
             for (const auto& [name, values] : entry->curves)
                 expected.try_emplace(name);
-        }
         for (const auto& [name, values] : expected) {
             const bool has = entry && entry->curves.contains(name);
             const std::vector<double> actual = has ? entry->curves.at(name) : std::vector<double>{};

@@ -19,13 +19,11 @@ constexpr std::string_view kSignsOfOtherOrder[] = {"3ds Max Wavefront", "Max2Obj
 constexpr std::string_view kTolerance = "tolerance=";
 
 void readComment(std::string_view line, WavefrontFile& file) {
-    for (const std::string_view sign : kSignsOfOtherOrder) {
+    for (const std::string_view sign : kSignsOfOtherOrder)
         if (line.find(sign) != std::string_view::npos)
             file.inOtherOrder = true;
-    }
-    if (const std::size_t at = line.find(kTolerance); at != std::string_view::npos) {
+    if (const std::size_t at = line.find(kTolerance); at != std::string_view::npos)
         file.tolerance = std::max(file.tolerance, std::stod(std::string(line.substr(at + kTolerance.size()))));
-    }
 }
 
 /// A unit of the last digit: 0.0001 for "1.2500". Half of it is lost here, and the FBX file's number was rounded too.

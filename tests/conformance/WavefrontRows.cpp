@@ -43,27 +43,24 @@ std::vector<Point> transformed(const FbxAMatrix& matrix, const std::vector<Point
 }
 
 bool near(const Point& a, const Point& b, double tolerance) {
-    for (std::size_t i = 0; i < a.size(); ++i) {
+    for (std::size_t i = 0; i < a.size(); ++i)
         if (!closeTo(a[i], b[i], kEvaluatedTolerance) && !(std::abs(a[i] - b[i]) <= tolerance))
             return false;
-    }
     return true;
 }
 
 /// The first point of `from` that has no counterpart in `to`; `from.size()` when there is none.
 std::size_t firstWithoutCounterpart(const std::vector<Point>& from, const std::vector<Point>& to, double tolerance) {
-    for (std::size_t i = 0; i < from.size(); ++i) {
+    for (std::size_t i = 0; i < from.size(); ++i)
         if (std::ranges::none_of(to, [&](const Point& point) { return near(from[i], point, tolerance); }))
             return i;
-    }
     return from.size();
 }
 
 /// Empty when the points agree, else the difference.
 std::string compareInOrder(const std::vector<Point>& actual, const std::vector<Point>& expected, double tolerance) {
-    if (actual.size() != expected.size()) {
+    if (actual.size() != expected.size())
         return std::to_string(actual.size()) + " points instead of " + std::to_string(expected.size());
-    }
     for (std::size_t i = 0; i < actual.size(); ++i) {
         if (near(actual[i], expected[i], tolerance))
             continue;
@@ -74,20 +71,17 @@ std::string compareInOrder(const std::vector<Point>& actual, const std::vector<P
 }
 
 std::string compareAsSets(const std::vector<Point>& actual, const std::vector<Point>& expected, double tolerance) {
-    if (const std::size_t i = firstWithoutCounterpart(expected, actual, tolerance); i < expected.size()) {
+    if (const std::size_t i = firstWithoutCounterpart(expected, actual, tolerance); i < expected.size())
         return "nothing at " + printed(expected[i].data(), 3);
-    }
-    if (const std::size_t i = firstWithoutCounterpart(actual, expected, tolerance); i < actual.size()) {
+    if (const std::size_t i = firstWithoutCounterpart(actual, expected, tolerance); i < actual.size())
         return "point " + std::to_string(i) + " at " + printed(actual[i].data(), 3) + ", where there is nothing";
-    }
     return {};
 }
 
 std::set<std::string> chainOf(const LoadedFile& file, std::size_t nodeIndex) {
     std::set<std::string> names;
-    for (int i = static_cast<int>(nodeIndex); i >= 0; i = file.reference().nodes[static_cast<std::size_t>(i)].parent) {
+    for (int i = static_cast<int>(nodeIndex); i >= 0; i = file.reference().nodes[static_cast<std::size_t>(i)].parent)
         names.insert(decodedName(file.reference().nodes[static_cast<std::size_t>(i)].name));
-    }
     return names;
 }
 
@@ -162,9 +156,8 @@ std::vector<std::string> differencesIn(const Space& space, const Reference& refe
     const double tolerance = wavefront.tolerance * matrix.GetS()[0];
     const auto compare = wavefront.inOtherOrder ? compareAsSets : compareInOrder;
     std::vector<std::string> differences;
-    for (const Pair& pair : pairs) {
+    for (const Pair& pair : pairs)
         differences.push_back(compare(pair.actual, transformed(matrix, *pair.wavefront), tolerance));
-    }
     return differences;
 }
 
@@ -178,8 +171,9 @@ void comparePairs(const Reference& reference, const WavefrontSibling& sibling, c
             best.swap(differences);
     }
     for (std::size_t i = 0; i < pairs.size(); ++i) {
-        findings.compare(best[i].empty(),
-                         [&] { return sibling.path.filename().string() + " \"" + *pairs[i].name + "\" " + best[i]; });
+        findings.compare(
+            best[i].empty(),
+            [&] { return sibling.path.filename().string() + " \"" + *pairs[i].name + "\" " + best[i]; });
     }
 }
 

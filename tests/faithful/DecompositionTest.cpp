@@ -24,20 +24,17 @@ fbxsdk::FbxAMatrix composed(const Parts& parts) {
     shear[2][1] = parts.skew[2];
     fbxsdk::FbxAMatrix matrix = parts.rotation * shear;
     for (int axis = 0; axis < 3; ++axis) {
-        for (int component = 0; component < 3; ++component) {
+        for (int component = 0; component < 3; ++component)
             matrix[axis][component] *= parts.scale[static_cast<std::size_t>(axis)];
-        }
         matrix[3][axis] = parts.position[static_cast<std::size_t>(axis)];
     }
     return matrix;
 }
 
 void expectSame(const fbxsdk::FbxAMatrix& actual, const fbxsdk::FbxAMatrix& expected) {
-    for (int row = 0; row < 4; ++row) {
-        for (int column = 0; column < 3; ++column) {
+    for (int row = 0; row < 4; ++row)
+        for (int column = 0; column < 3; ++column)
             EXPECT_NEAR(actual.Get(row, column), expected.Get(row, column), 1e-9) << row << ' ' << column;
-        }
-    }
 }
 
 TEST(Decomposition, GivesPartsThatMakeAnyMatrixAgain) {
@@ -45,11 +42,9 @@ TEST(Decomposition, GivesPartsThatMakeAnyMatrixAgain) {
     std::uniform_real_distribution<double> number(-5.0, 5.0);
     for (int i = 0; i < 1000; ++i) {
         fbxsdk::FbxAMatrix matrix;
-        for (int row = 0; row < 4; ++row) {
-            for (int column = 0; column < 3; ++column) {
+        for (int row = 0; row < 4; ++row)
+            for (int column = 0; column < 3; ++column)
                 matrix[row][column] = number(random);
-            }
-        }
         const Parts parts = decompose(matrix, {1.0, number(random), 1.0});
         expectSame(composed(parts), matrix);
         EXPECT_EQ(handedness(parts.rotation), 1.0);
@@ -59,9 +54,8 @@ TEST(Decomposition, GivesPartsThatMakeAnyMatrixAgain) {
 TEST(Decomposition, TakesTheSignsOfTheScaleThatItIsGiven) {
     fbxsdk::FbxAMatrix mirrored;
     mirrored.SetTRS({1.0, 2.0, 3.0}, {10.0, 20.0, 30.0}, {1.0, 1.0, 1.0});
-    for (int component = 0; component < 3; ++component) {
+    for (int component = 0; component < 3; ++component)
         mirrored[1][component] *= -2.0;
-    }
     const Parts parts = decompose(mirrored, {1.0, -1.0, 1.0});
     EXPECT_NEAR(parts.scale[0], 1.0, 1e-12);
     EXPECT_NEAR(parts.scale[1], -2.0, 1e-12);
@@ -82,9 +76,8 @@ TEST(Decomposition, ScalesXTheOtherWayWhereTheSignsDoNotMirror) {
 TEST(Decomposition, TakesAFlatAxisPerpendicularToTheOthers) {
     fbxsdk::FbxAMatrix flat;
     flat.SetR({0.0, 0.0, 90.0});
-    for (int component = 0; component < 3; ++component) {
+    for (int component = 0; component < 3; ++component)
         flat[1][component] = 0.0;
-    }
     const Parts parts = decompose(flat, {1.0, 1.0, 1.0});
     EXPECT_EQ(parts.scale[1], 0.0);
     EXPECT_NEAR(anglesNear(parts.rotation, TnFbxTransform::kFbxRotationOrderXYZ, {})[2], 90.0, 1e-9);
@@ -100,9 +93,8 @@ TEST(Angles, TurnLikeTheRotationInEveryOrder) {
             const Vector angles = {angle(random), angle(random), angle(random)};
             const fbxsdk::FbxAMatrix rotation = rotationOf(angles, order);
             const Vector found = anglesNear(rotation, order, angles);
-            for (std::size_t axis = 0; axis < 3; ++axis) {
+            for (std::size_t axis = 0; axis < 3; ++axis)
                 EXPECT_NEAR(found[axis], angles[axis], 1e-6) << order;
-            }
         }
     }
 }
@@ -118,9 +110,8 @@ TEST(Angles, GoOnThroughGimbalLockWithoutAFlip) {
         Vector given = before;
         for (int frame = 0; frame < 20; ++frame, given[middle] += 1.0) { // through 90 degrees, where frame 10 is
             const Vector now = anglesNear(rotationOf(given, order), order, before);
-            for (std::size_t axis = 0; axis < 3; ++axis) {
+            for (std::size_t axis = 0; axis < 3; ++axis)
                 EXPECT_NEAR(now[axis], given[axis], 1e-4) << order << " at " << frame;
-            }
             before = now;
         }
     }

@@ -144,9 +144,8 @@ TEST(FaithfulSkins, AreInTheWorldOnce) {
     const Samples position = positionOf(world.objects[0]);
     const Samples placed = pointsOf(world.objects[0]);
     const Samples relative = pointsOf(inside.objects[0]);
-    for (std::size_t i = 0; i < placed.size(); ++i) {
+    for (std::size_t i = 0; i < placed.size(); ++i)
         EXPECT_NEAR(static_cast<double>(placed[i]), static_cast<double>(relative[i] + position[i % 3]), 1e-5) << i;
-    }
 }
 
 /// A point at (0, 1, 0) halfway between a static bone and one that is rotated by 90 degrees about X.

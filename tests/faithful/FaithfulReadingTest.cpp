@@ -150,9 +150,8 @@ TEST(FaithfulReading, GoesOnFromFrameToFrameWhereAParentTurns) {
     child->LclRotation.Set(fbxsdk::FbxDouble3(0.0, 40.0, 20.0));
     const auto samples = samplesOf(readFaithfully<TnFbxNull>(scene)["child"], kTurnX);
     ASSERT_EQ(samples.size(), 37u);
-    for (std::size_t i = 1; i < samples.size(); ++i) {
+    for (std::size_t i = 1; i < samples.size(); ++i)
         EXPECT_LT(std::abs(samples[i] - samples[i - 1]), 90.0f) << i;
-    }
 }
 
 TEST(FaithfulReading, ReturnsAMirroredScaleAndTheOrderInForce) {

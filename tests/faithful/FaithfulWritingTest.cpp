@@ -60,9 +60,8 @@ public:
     }
     std::string warningText() const {
         std::string text;
-        for (const std::string& warning : warnings) {
+        for (const std::string& warning : warnings)
             text += warning + '\n';
-        }
         return text;
     }
 
@@ -77,9 +76,8 @@ void expectSameChannel(const TnFbxChannel& expected, const TnFbxChannel& actual,
                        float tolerance) {
     EXPECT_NEAR(expected.getValue(), actual.getValue(), tolerance) << name;
     ASSERT_EQ(expected.getAnimated(), actual.getAnimated()) << name;
-    if (!expected.getAnimated()) {
+    if (!expected.getAnimated())
         return;
-    }
     const TnFbxTime wanted = expected.getTime(), found = actual.getTime();
     EXPECT_EQ(wanted.getStartFrame(), found.getStartFrame()) << name;
     EXPECT_EQ(wanted.getEndFrame(), found.getEndFrame()) << name;
@@ -122,9 +120,8 @@ void placeSomewhere(Transform& object, bool animated) {
     for (int i = 0; i < 9; ++i) {
         const auto channel = static_cast<Transform::EFbxTransformChannelType>(i);
         object.setTransformValue(channel, values[i]);
-        if (animated) {
+        if (animated)
             animate(object, channel, values[i], 0.25f);
-        }
     }
 }
 
@@ -174,16 +171,14 @@ TEST_P(EveryVersion, BringsSkewsBack) {
     for (int i = 0; i < 3; ++i) {
         const auto channel = static_cast<Transform::EFbxTransformChannelType>(Transform::kFbxTransformSkewX + i);
         object.setTransformValue(channel, 0.5f - 0.25f * static_cast<float>(i));
-        if (animated) {
+        if (animated)
             animate(object, channel, 0.5f - 0.25f * static_cast<float>(i), 0.1f);
-        }
     }
     file.write({{}, {}, {&object}, {}, {}});
     // Angles within a turn: the node's own are not those of the object.
     object.setTransformValue(Transform::kFbxTransformRotationY, -40.0f);
-    if (animated) {
+    if (animated)
         animate(object, Transform::kFbxTransformRotationY, -40.0f, 0.25f);
-    }
     auto read = readAtStart<Transform>();
     EXPECT_EQ(read.names(), (std::vector<std::string>{"askew skew", "askew"}));
     expectSameTransform(object, read["askew"], 2e-4f);
@@ -200,9 +195,8 @@ TEST_P(EveryVersion, BringsLightsBack) {
         for (int i = 0; i < 6; ++i) {
             const auto channel = static_cast<TnFbxLight::EFbxLightChannelType>(i);
             light.setValue(channel, values[i]);
-            if (animated && channel != TnFbxLight::kFbxLightAlpha) {
+            if (animated && channel != TnFbxLight::kFbxLightAlpha)
                 animate(light, channel, values[i], 0.0625f);
-            }
         }
         file.write({{}, {&light}, {}, {}, {}});
         EXPECT_EQ(file.warningText(), "");
@@ -242,9 +236,8 @@ void setLens(Camera& camera, Camera::EFbxCameraApertureMode mode, bool animated)
     time.setTime(1001.0f, 1001, 1005, kTelevision);
     const auto set = [&](Camera::EFbxCameraChannelType channel, const std::vector<float>& values) {
         camera.setValue(channel, values[0]);
-        if (animated) {
+        if (animated)
             camera.setValueAt(channel, time, values);
-        }
     };
     set(Camera::kFbxCameraFocalLength, focalLengths);
     set(Camera::kFbxCameraFieldOfView, both);
@@ -267,9 +260,8 @@ TEST_P(EveryVersion, BringsCamerasBack) {
             {Camera::kFbxCameraFilmOffsetY, -0.2f}};
         for (const auto& [channel, value] : values) {
             camera.setValue(channel, value);
-            if (animated) {
+            if (animated)
                 animate(camera, channel, value, 0.5f);
-            }
         }
         file.write({{&camera}, {}, {}, {}, {}});
         EXPECT_EQ(file.warningText(), "");
@@ -494,9 +486,8 @@ TEST(FaithfulWriting, WritesWhatAReadPlacedWhereItWas) {
     placeSomewhere(*mesh, false);
     mesh->setTransformValue(Transform::kFbxTransformScaleX, -2.0f); // a mirror
     mesh->setValidNormals(true);
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         mesh->setNormal(i, 0.0f, 0.6f, 0.8f);
-    }
     first.write({{}, {}, {}, {}, {mesh.get()}});
     FacadeRead<TnFbxMesh> placed(faithfulRead(first.info.getFileName()));
     second.write({{}, {}, {}, {}, {&placed["mesh"]}});

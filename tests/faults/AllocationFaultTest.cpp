@@ -75,9 +75,8 @@ std::vector<std::string>& usualWarnings() {
 }
 
 void failUnlessTold(bool result) {
-    if (!result && lastError().empty()) {
+    if (!result && lastError().empty())
         ADD_FAILURE() << "a failure without a reason";
-    }
 }
 
 /// Objects of one kind, read while allocations may fail, and accessed when they do not any more.
@@ -95,15 +94,13 @@ Answer read(bool (Fbx::*reader)(TnFbxReadInfo&, Object**, int&) const, TnFbxRead
     faults::failNoAllocation();
     const std::unique_ptr<Object[]> owner(objects);
     EXPECT_TRUE(objects == nullptr || count > 0);
-    if (hadMemory) {
+    if (hadMemory)
         failUnlessTold(result);
-    }
     Numbers numbers;
     for (int i = 0; objects != nullptr && i < count; ++i) { // whatever the result, they can be accessed
         numbers.addChannels(objects[i]);
-        if constexpr (std::is_same_v<Object, TnFbxMesh>) {
+        if constexpr (std::is_same_v<Object, TnFbxMesh>)
             numbers.addMesh(objects[i]);
-        }
     }
     return result && lastWarnings() == usualWarnings() ? Answer(numbers.take()) : std::nullopt;
 }
@@ -138,9 +135,8 @@ TEST_P(ReadingWithoutMemory, GivesAllOrFails) {
     TnFbxReadInfo info;
     info.setFileName(std::string(TARNELL_TEST_DATA) + "/" + file);
     info.setFidelity(fidelity);
-    if (fidelity == kFbxFidelityCompatible) {
+    if (fidelity == kFbxFidelityCompatible)
         info.setAnimationStackName("Take 001");
-    }
     tryPositions([&] { return read(&Fbx::getMeshes, info); });
     tryPositions([&] { return read(&Fbx::getCameras, info); });
     tryPositions([&] { return read(&Fbx::getTransforms, info); });
@@ -179,9 +175,8 @@ TEST_P(ReadingInstancesWithoutMemory, GivesAllOrFails) {
     info.setFileName(folder.write("instances.fbx", kInstances));
     info.setFidelity(GetParam());
     info.setTransformPoints(true);
-    if (GetParam() == kFbxFidelityCompatible) {
+    if (GetParam() == kFbxFidelityCompatible)
         info.setAnimationStackName("Take 001");
-    }
     tryPositions([&] { return read(&Fbx::getMeshes, info); });
 }
 
@@ -245,9 +240,8 @@ TEST_P(WritingWithoutMemory, WritesAllOrFails) {
             hadMemory = false;
         }
         faults::failNoAllocation();
-        if (hadMemory) {
+        if (hadMemory)
             failUnlessTold(result);
-        }
         EXPECT_EQ(testing::PrintToString(folder.files()), R"({ "shot.fbx" })");
         return result && lastWarnings() == usualWarnings() ? Answer(std::vector<double>{content()}) : std::nullopt;
     });

@@ -40,9 +40,8 @@ std::unique_ptr<TnFbxMesh> wavingSheet() {
         mesh->setPointIndex(3 * i + 2, i + kSide);
     }
     for (int set = 0; set < kSets; ++set) {
-        if (set > 0) {
+        if (set > 0)
             mesh->addControlPointSet();
-        }
         for (int i = 0; i < kPoints; ++i) {
             const auto number = static_cast<float>(i);
             const float x = number * 0.37f, y = number * number * 0.11f, z = static_cast<float>(set);
@@ -108,11 +107,9 @@ protected:
 
     [[nodiscard]] std::string fbx() const { return mFolder.file("shot.fbx"); }
     [[nodiscard]] std::string changingFile() const {
-        for (const auto& entry : std::filesystem::recursive_directory_iterator(mFolder.path())) {
-            if (entry.path().extension() == GetParam().changes) {
+        for (const auto& entry : std::filesystem::recursive_directory_iterator(mFolder.path()))
+            if (entry.path().extension() == GetParam().changes)
                 return entry.path().string();
-            }
-        }
         ADD_FAILURE() << "no file *" << GetParam().changes;
         return {};
     }

@@ -25,9 +25,8 @@ std::atomic<long> gCount{0}, gFirst{kNever}, gEnd{0};
 
 bool fails() {
     const long number = gCount.fetch_add(1, std::memory_order_relaxed);
-    if (number < gFirst.load(std::memory_order_relaxed) || number >= gEnd.load(std::memory_order_relaxed)) {
+    if (number < gFirst.load(std::memory_order_relaxed) || number >= gEnd.load(std::memory_order_relaxed))
         return false;
-    }
     errno = ENOMEM;
     return true;
 }

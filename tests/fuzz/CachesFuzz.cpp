@@ -108,10 +108,10 @@ void readMax(FbxCache& cache) {
     const auto start = static_cast<unsigned int>(static_cast<std::int64_t>(
         std::clamp(cache.GetFrameStartOffset(), static_cast<double>(INT32_MIN), static_cast<double>(INT32_MAX))));
     for (const unsigned int frame : {0U, start, start + samples - 1, start + samples / 2, 0x80000000U, 0x7FFFFFFFU}) {
-        for (const std::uint64_t count : {std::uint64_t{points}, std::uint64_t{kMeshPoints}}) {
+        for (const std::uint64_t count : {std::uint64_t{points}, std::uint64_t{kMeshPoints}})
             if (count <= kMostPoints)
-                readTwice(count, [&](double* to) { return cache.Read(frame, to, static_cast<unsigned int>(count)); });
-        }
+                readTwice(
+                    count, [&](double* to) { return cache.Read(frame, to, static_cast<unsigned int>(count)); });
     }
 }
 
@@ -125,9 +125,9 @@ void readMaya(FbxCache& cache, const CacheFacts& facts) {
             fbxsdk::FbxTime time(ticks);
             for (const std::uint64_t count : {most, std::uint64_t{kMeshPoints}}) {
                 if (count > 0 && count <= kMostPoints)
-                    readTwice(count, [&](double* to) {
-                        return cache.Read(channel, time, to, static_cast<unsigned int>(count));
-                    });
+                    readTwice(
+                        count,
+                        [&](double* to) { return cache.Read(channel, time, to, static_cast<unsigned int>(count)); });
             }
         }
     }

@@ -58,10 +58,9 @@ int longestClip(const TnFbxLight& light) {
 
 template <class Object>
 bool areShort(const List<Object>& list) {
-    for (const Object* object : list.pointers()) {
+    for (const Object* object : list.pointers())
         if (longestClip(*object) > kLongestWrittenClip)
             return false;
-    }
     return true;
 }
 

@@ -69,9 +69,8 @@ void visit(const Record& record, std::string& transcript) {
     readTwice<std::int64_t>(record);
     readTwice<std::uint32_t>(record);
     transcript += '{';
-    for (const Record& child : record.children()) {
+    for (const Record& child : record.children())
         visit(child, transcript);
-    }
     transcript += '}';
 }
 
@@ -79,9 +78,8 @@ std::string transcriptOf(std::span<const char> bytes) {
     fbxsdk::FbxStatus status;
     const auto tree = readRecords(bytes, "fuzz.fbx", status);
     require(status.Error() == (tree == nullptr), "status and result disagree");
-    if (!tree) {
+    if (!tree)
         return status.GetErrorString();
-    }
     std::string transcript = std::to_string(tree->version);
     visit(tree->root, transcript);
     return transcript;

@@ -82,9 +82,8 @@ void readMesh(FbxMesh& mesh) {
 }
 
 void readNode(FbxNode& node, FbxAnimLayer* layer) {
-    for (int i = 0; i < node.GetChildCount(); ++i) {
+    for (int i = 0; i < node.GetChildCount(); ++i)
         require(node.GetChild(i)->GetParent() == &node, "a child with another parent");
-    }
     for (int i = 0; i < node.GetNodeAttributeCount(); ++i) {
         FbxNodeAttribute* attribute = node.GetNodeAttributeByIndex(i);
         bool known = false;
@@ -96,9 +95,8 @@ void readNode(FbxNode& node, FbxAnimLayer* layer) {
             readMesh(*mesh);
     }
     readCurves(node, layer);
-    for (const FbxLongLong ticks : {FbxLongLong{0}, FbxLongLong{46186158000}, FbxLongLong{1} << 60}) {
+    for (const FbxLongLong ticks : {FbxLongLong{0}, FbxLongLong{46186158000}, FbxLongLong{1} << 60})
         (void)node.EvaluateGlobalTransform(FbxTime(ticks)).GetR();
-    }
 }
 
 void readScene(FbxScene& scene) {
@@ -140,10 +138,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t siz
     }
     const std::unique_ptr<FbxManager, ManagerDeleter> manager(FbxManager::Create());
     FbxScene* scene = FbxScene::Create(manager.get(), "");
-    if (detail::readScene(document, *scene, status)) {
+    if (detail::readScene(document, *scene, status))
         readScene(*scene);
-    } else {
+    else
         require(status.Error(), "a failure without a reason");
-    }
     return 0;
 }

@@ -29,15 +29,12 @@ namespace fs = std::filesystem;
 using Random = std::mt19937_64;
 
 std::vector<fs::path> filesIn(const fs::path& path) {
-    if (!fs::is_directory(path)) {
+    if (!fs::is_directory(path))
         return {path};
-    }
     std::vector<fs::path> files;
-    for (const fs::directory_entry& entry : fs::recursive_directory_iterator(path)) {
-        if (entry.is_regular_file()) {
+    for (const fs::directory_entry& entry : fs::recursive_directory_iterator(path))
+        if (entry.is_regular_file())
             files.push_back(entry.path());
-        }
-    }
     std::sort(files.begin(), files.end());
     return files;
 }
@@ -56,17 +53,15 @@ void run(const std::string& bytes) {
 /// FNV-1a.
 std::uint64_t hash(const std::string& text) {
     std::uint64_t value = 0xCBF29CE484222325;
-    for (const char c : text) {
+    for (const char c : text)
         value = (value ^ static_cast<unsigned char>(c)) * 0x100000001B3;
-    }
     return value;
 }
 
 /// One small mutation: a byte changed, a number made extreme, a part doubled, dropped or moved, the end truncated.
 void mutate(std::string& bytes, Random& random) {
-    if (bytes.empty()) {
+    if (bytes.empty())
         return;
-    }
     constexpr std::size_t kLongestPiece = 64;
     const std::size_t place = random() % bytes.size();
     const std::size_t length = std::min<std::size_t>(1 + random() % kLongestPiece, bytes.size() - place);
@@ -97,9 +92,8 @@ void runMutations(const fs::path& path, const std::string& original, int count) 
     Random random(hash(path.filename().string() + original));
     for (int i = 0; i < count; ++i) {
         std::string bytes = original;
-        for (auto accidents = 1 + random() % 4; accidents > 0; --accidents) {
+        for (auto accidents = 1 + random() % 4; accidents > 0; --accidents)
             mutate(bytes, random);
-        }
         run(bytes);
     }
 }
@@ -114,23 +108,19 @@ constexpr int kSkipped = 77;
 std::vector<fs::path> sampleOf(const std::vector<fs::path>& files) {
     std::vector<fs::path> sample;
     const std::size_t count = std::min(kCorpusFilesPerContainer, files.size());
-    for (std::size_t i = 0; i < count; ++i) {
+    for (std::size_t i = 0; i < count; ++i)
         sample.push_back(files[i * files.size() / count]);
-    }
     return sample;
 }
 
 std::vector<fs::path> corpusFiles(const fs::path& folder) {
     std::vector<fs::path> binary, ascii;
-    for (const fs::path& path : filesIn(folder)) {
-        if (path.extension() == ".fbx" && fs::file_size(path) <= kLargestCorpusFile) {
+    for (const fs::path& path : filesIn(folder))
+        if (path.extension() == ".fbx" && fs::file_size(path) <= kLargestCorpusFile)
             (readFile(path).starts_with("Kaydara") ? binary : ascii).push_back(path);
-        }
-    }
     std::vector<fs::path> files = sampleOf(binary);
-    for (const fs::path& path : sampleOf(ascii)) {
+    for (const fs::path& path : sampleOf(ascii))
         files.push_back(path);
-    }
     return files;
 }
 
@@ -145,9 +135,8 @@ int runCorpus(const char* fallback, int mutations) {
     for (const fs::path& path : corpusFiles(folder)) {
         const std::string bytes = readFile(path);
         run(bytes);
-        for (std::size_t i = 0; i < kCuts; ++i) {
+        for (std::size_t i = 0; i < kCuts; ++i)
             run(bytes.substr(0, bytes.size() * i / kCuts));
-        }
         runMutations(path, bytes, mutations);
         inputs += 1 + kCuts + static_cast<std::size_t>(mutations);
     }
@@ -165,9 +154,8 @@ int main(int argumentCount, char** arguments) {
             mutations = std::atoi(arguments[++i]);
             continue;
         }
-        if (std::strcmp(arguments[i], "--corpus") == 0 && i + 1 < argumentCount) {
+        if (std::strcmp(arguments[i], "--corpus") == 0 && i + 1 < argumentCount)
             return runCorpus(arguments[i + 1], mutations);
-        }
         if (!fs::exists(arguments[i])) {
             std::fprintf(stderr, "%s: not there\n", arguments[i]);
             return EXIT_FAILURE;

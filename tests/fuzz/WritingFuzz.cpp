@@ -211,7 +211,8 @@ struct Scene {
 
 template <class Object>
 int countOf(const std::vector<Object*>& pointers) {
-    return static_cast<int>(std::count_if(pointers.begin(), pointers.end(), [](const Object* o) { return o; }));
+    return static_cast<int>(std::count_if(
+        pointers.begin(), pointers.end(), [](const Object* o) { return o; }));
 }
 
 /// The content of a file of the scene.
@@ -255,10 +256,9 @@ void requireSamePlace(const TnFbxTransform& written, const TnFbxTransform& read,
 /// The objects of a kind are consecutive in the copy, in order.
 template <class Object, class Read>
 void requireSamePlaces(const std::vector<Object*>& written, const List<Read>& copy, int from, bool ascii) {
-    for (const Object* object : written) {
+    for (const Object* object : written)
         if (object)
             requireSamePlace(*object, copy.objects[static_cast<std::size_t>(from++)], ascii);
-    }
 }
 
 void compare(const Scene& scene, const Copy& copy, bool ascii) {

@@ -83,67 +83,76 @@ std::string repeated(File file, int count, Each each) {
 File withMesh() { return File().model(10, "m", "Mesh").mesh(11, 10); }
 
 std::string nulls(int count) {
-    return repeated(File(), count, [](File& file, int id, int i) { file.model(id, numbered("n", i)); });
+    return repeated(
+        File(), count, [](File& file, int id, int i) { file.model(id, numbered("n", i)); });
 }
 std::string nullsOfOneName(int count) {
-    return repeated(File(), count, [](File& file, int id, int) { file.model(id, "n"); });
+    return repeated(
+        File(), count, [](File& file, int id, int) { file.model(id, "n"); });
 }
 std::string nullsOfLongNames(int count) {
-    return repeated(File(), count,
-                    [](File& file, int id, int i) { file.model(id, std::string(400, 'x') + std::to_string(i)); });
+    return repeated(
+        File(), count, [](File& file, int id, int i) { file.model(id, std::string(400, 'x') + std::to_string(i)); });
 }
 std::string childrenOfOne(int count) {
-    return repeated(File().model(10, "parent"), count,
-                    [](File& file, int id, int i) { file.model(id, numbered("n", i), "Null", 10); });
+    return repeated(
+        File().model(10, "parent"), count,
+        [](File& file, int id, int i) { file.model(id, numbered("n", i), "Null", 10); });
 }
 std::string chain(int count) {
-    return repeated(File(), count, [](File& file, int id, int i) {
-        file.model(id, numbered("n", i), "Null", i > 0 ? id - kStep : 0);
-    });
+    return repeated(
+        File(), count,
+        [](File& file, int id, int i) { file.model(id, numbered("n", i), "Null", i > 0 ? id - kStep : 0); });
 }
 std::string childrenOfTwo(int count) {
-    return repeated(File().model(10, "a").model(11, "b"), count,
-                    [](File& file, int id, int i) { file.model(id, numbered("n", i), "Null", 10).connect(id, 11); });
+    return repeated(
+        File().model(10, "a").model(11, "b"), count,
+        [](File& file, int id, int i) { file.model(id, numbered("n", i), "Null", 10).connect(id, 11); });
 }
 std::string doubledConnections(int count) {
-    return repeated(File().model(10, "a").model(11, "b", "Null", 10), count,
-                    [](File& file, int, int) { file.connect(11, 10); });
+    return repeated(
+        File().model(10, "a").model(11, "b", "Null", 10), count, [](File& file, int, int) { file.connect(11, 10); });
 }
 template <const char* const& attribute>
 std::string attributes(int count) {
-    return repeated(File(), count, [](File& file, int id, int i) {
-        file.model(id, numbered("a", i), attribute)
-            .object("NodeAttribute", id + 1, "", attribute, std::string("TypeFlags: \"") + attribute + "\"\n")
-            .connect(id + 1, id);
-    });
+    return repeated(
+        File(), count,
+        [](File& file, int id, int i) {
+            file.model(id, numbered("a", i), attribute)
+                .object("NodeAttribute", id + 1, "", attribute, std::string("TypeFlags: \"") + attribute + "\"\n")
+                .connect(id + 1, id);
+        });
 }
 constexpr const char* kCamera = "Camera";
 constexpr const char* kLight = "Light";
 constexpr const char* kMarker = "Marker";
 constexpr const char* kBone = "LimbNode";
 std::string attributesOfOne(int count) {
-    return repeated(File().model(10, "a"), count, [](File& file, int id, int) {
-        file.object("NodeAttribute", id, "", "Null", "TypeFlags: \"Null\"\n").connect(id, 10);
-    });
+    return repeated(
+        File().model(10, "a"), count,
+        [](File& file, int id, int) {
+            file.object("NodeAttribute", id, "", "Null", "TypeFlags: \"Null\"\n").connect(id, 10);
+        });
 }
 std::string targets(int count) {
-    return repeated(File().model(10, "target"), count, [](File& file, int id, int i) {
-        file.model(id, numbered("n", i)).connect(10, id, "LookAtProperty");
-    });
+    return repeated(
+        File().model(10, "target"), count,
+        [](File& file, int id, int i) { file.model(id, numbered("n", i)).connect(10, id, "LookAtProperty"); });
 }
 std::string targetsOfOne(int count) {
-    return repeated(File().model(10, "looking"), count, [](File& file, int id, int i) {
-        file.model(id, numbered("n", i)).connect(id, 10, "LookAtProperty");
-    });
+    return repeated(
+        File().model(10, "looking"), count,
+        [](File& file, int id, int i) { file.model(id, numbered("n", i)).connect(id, 10, "LookAtProperty"); });
 }
 
 std::string meshes(int count) {
-    return repeated(File(), count,
-                    [](File& file, int id, int i) { file.model(id, numbered("m", i), "Mesh").mesh(id + 1, id); });
+    return repeated(
+        File(), count, [](File& file, int id, int i) { file.model(id, numbered("m", i), "Mesh").mesh(id + 1, id); });
 }
 std::string instances(int count) {
-    return repeated(File().object("Geometry", 11, "", "Mesh", kTriangle), count,
-                    [](File& file, int id, int i) { file.model(id, numbered("m", i), "Mesh").connect(11, id); });
+    return repeated(
+        File().object("Geometry", 11, "", "Mesh", kTriangle), count,
+        [](File& file, int id, int i) { file.model(id, numbered("m", i), "Mesh").connect(11, id); });
 }
 std::string surfaces(int count) {
     constexpr char kSurface[] =
@@ -155,17 +164,21 @@ std::string surfaces(int count) {
 }
 
 std::string materials(int count) {
-    return repeated(File(), count, [](File& file, int id, int i) {
-        file.model(id, numbered("m", i), "Mesh")
-            .mesh(id + 1, id)
-            .object("Material", id + 2, numbered("s", i), "", "ShadingModel: \"phong\"\n")
-            .connect(id + 2, id);
-    });
+    return repeated(
+        File(), count,
+        [](File& file, int id, int i) {
+            file.model(id, numbered("m", i), "Mesh")
+                .mesh(id + 1, id)
+                .object("Material", id + 2, numbered("s", i), "", "ShadingModel: \"phong\"\n")
+                .connect(id + 2, id);
+        });
 }
 std::string materialsOfOne(int count) {
-    return repeated(withMesh(), count, [](File& file, int id, int i) {
-        file.object("Material", id, numbered("s", i), "", "ShadingModel: \"phong\"\n").connect(id, 10);
-    });
+    return repeated(
+        withMesh(), count,
+        [](File& file, int id, int i) {
+            file.object("Material", id, numbered("s", i), "", "ShadingModel: \"phong\"\n").connect(id, 10);
+        });
 }
 std::string nodesOfOneMaterial(int count) {
     return repeated(
@@ -173,19 +186,20 @@ std::string nodesOfOneMaterial(int count) {
         [](File& file, int id, int i) { file.model(id, numbered("m", i), "Mesh").mesh(id + 1, id).connect(20, id); });
 }
 std::string texturesOfOne(int count) {
-    return repeated(withMesh().object("Material", 20, "s", "", "ShadingModel: \"phong\"\n").connect(20, 10), count,
-                    [](File& file, int id, int i) {
-                        file.object("Texture", id, numbered("t", i), "", "FileName: \"t.png\"\n")
-                            .connect(id, 20, "DiffuseColor")
-                            .object("Video", id + 1, numbered("v", i), "Clip", "Filename: \"t.png\"\n")
-                            .connect(id + 1, id);
-                    });
+    return repeated(
+        withMesh().object("Material", 20, "s", "", "ShadingModel: \"phong\"\n").connect(20, 10), count,
+        [](File& file, int id, int i) {
+            file.object("Texture", id, numbered("t", i), "", "FileName: \"t.png\"\n")
+                .connect(id, 20, "DiffuseColor")
+                .object("Video", id + 1, numbered("v", i), "Clip", "Filename: \"t.png\"\n")
+                .connect(id + 1, id);
+        });
 }
 
 std::string skinsOfOne(int count) {
-    return repeated(withMesh(), count, [](File& file, int id, int i) {
-        file.object("Deformer", id, numbered("s", i), "Skin").connect(id, 11);
-    });
+    return repeated(
+        withMesh(), count,
+        [](File& file, int id, int i) { file.object("Deformer", id, numbered("s", i), "Skin").connect(id, 11); });
 }
 std::string clustersOfOne(int count) {
     const std::string body = std::string("Indexes: *1 {\na: 0\n}\nWeights: *1 {\na: 1\n}\nTransform: ") + kMatrix +
@@ -199,74 +213,87 @@ std::string clustersOfOne(int count) {
                     });
 }
 std::string blendShapesOfOne(int count) {
-    return repeated(withMesh(), count, [](File& file, int id, int i) {
-        file.object("Deformer", id, numbered("b", i), "BlendShape").connect(id, 11);
-    });
+    return repeated(
+        withMesh(), count,
+        [](File& file, int id, int i) { file.object("Deformer", id, numbered("b", i), "BlendShape").connect(id, 11); });
 }
 constexpr char kShape[] = "Indexes: *1 {\na: 0\n}\nVertices: *3 {\na: 1,0,0\n}\nNormals: *3 {\na: 0,0,0\n}\n";
 std::string channelsOfOne(int count) {
-    return repeated(withMesh().object("Deformer", 12, "b", "BlendShape").connect(12, 11), count,
-                    [](File& file, int id, int i) {
-                        file.object("Deformer", id, numbered("c", i), "BlendShapeChannel", "DeformPercent: 0\n")
-                            .connect(id, 12)
-                            .object("Geometry", id + 1, numbered("g", i), "Shape", kShape)
-                            .connect(id + 1, id);
-                    });
+    return repeated(
+        withMesh().object("Deformer", 12, "b", "BlendShape").connect(12, 11), count,
+        [](File& file, int id, int i) {
+            file.object("Deformer", id, numbered("c", i), "BlendShapeChannel", "DeformPercent: 0\n")
+                .connect(id, 12)
+                .object("Geometry", id + 1, numbered("g", i), "Shape", kShape)
+                .connect(id + 1, id);
+        });
 }
 std::string shapesOfOne(int count) {
-    return repeated(withMesh()
-                        .object("Deformer", 12, "b", "BlendShape")
-                        .connect(12, 11)
-                        .object("Deformer", 13, "c", "BlendShapeChannel", "DeformPercent: 0\n")
-                        .connect(13, 12),
-                    count, [](File& file, int id, int i) {
-                        file.object("Geometry", id, numbered("g", i), "Shape", kShape).connect(id, 13);
-                    });
+    return repeated(
+        withMesh()
+            .object("Deformer", 12, "b", "BlendShape")
+            .connect(12, 11)
+            .object("Deformer", 13, "c", "BlendShapeChannel", "DeformPercent: 0\n")
+            .connect(13, 12),
+        count,
+        [](File& file, int id, int i) {
+            file.object("Geometry", id, numbered("g", i), "Shape", kShape).connect(id, 13);
+        });
 }
 
 std::string stacks(int count) {
-    return repeated(File(), count, [](File& file, int id, int i) { file.stack(id, numbered("Take ", i)); });
+    return repeated(
+        File(), count, [](File& file, int id, int i) { file.stack(id, numbered("Take ", i)); });
 }
 /// Each moves a null of its own.
 std::string movingStacks(int count) {
-    return repeated(File(), count, [](File& file, int id, int i) {
-        file.stack(id, numbered("Take ", i))
-            .object("AnimationLayer", id + 1, "Base", "")
-            .connect(id + 1, id)
-            .model(id + 2, numbered("n", i))
-            .object("AnimationCurveNode", id + 3, "T", "")
-            .connect(id + 3, id + 1)
-            .connect(id + 3, id + 2, "Lcl Translation")
-            .curve(id + 4)
-            .connect(id + 4, id + 3, "d|X");
-    });
+    return repeated(
+        File(), count,
+        [](File& file, int id, int i) {
+            file.stack(id, numbered("Take ", i))
+                .object("AnimationLayer", id + 1, "Base", "")
+                .connect(id + 1, id)
+                .model(id + 2, numbered("n", i))
+                .object("AnimationCurveNode", id + 3, "T", "")
+                .connect(id + 3, id + 1)
+                .connect(id + 3, id + 2, "Lcl Translation")
+                .curve(id + 4)
+                .connect(id + 4, id + 3, "d|X");
+        });
 }
 std::string layers(int count) {
-    return repeated(File().stack(2, "Take 001"), count, [](File& file, int id, int i) {
-        file.object("AnimationLayer", id, numbered("L", i), "").connect(id, 2);
-    });
+    return repeated(
+        File().stack(2, "Take 001"), count,
+        [](File& file, int id, int i) { file.object("AnimationLayer", id, numbered("L", i), "").connect(id, 2); });
 }
 std::string movingNulls(int count) {
-    return repeated(File().animation(), count, [](File& file, int id, int i) {
-        file.model(id, numbered("n", i)).curveNode(id + 1, id).curve(id + 2).connect(id + 2, id + 1, "d|X");
-    });
+    return repeated(
+        File().animation(), count,
+        [](File& file, int id, int i) {
+            file.model(id, numbered("n", i)).curveNode(id + 1, id).curve(id + 2).connect(id + 2, id + 1, "d|X");
+        });
 }
 std::string curvesOfOneChannel(int count) {
-    return repeated(File().animation().model(10, "n").curveNode(11, 10), count,
-                    [](File& file, int id, int) { file.curve(id).connect(id, 11, "d|X"); });
+    return repeated(
+        File().animation().model(10, "n").curveNode(11, 10), count,
+        [](File& file, int id, int) { file.curve(id).connect(id, 11, "d|X"); });
 }
 std::string curveOfManyNodes(int count) {
-    return repeated(File().animation().curve(10), count, [](File& file, int id, int i) {
-        file.model(id, numbered("n", i)).curveNode(id + 1, id).connect(10, id + 1, "d|X");
-    });
+    return repeated(
+        File().animation().curve(10), count,
+        [](File& file, int id, int i) {
+            file.model(id, numbered("n", i)).curveNode(id + 1, id).connect(10, id + 1, "d|X");
+        });
 }
 std::string channelsOfOneNode(int count) {
-    return repeated(File().animation().model(10, "n").curveNode(11, 10), count,
-                    [](File& file, int id, int i) { file.curve(id).connect(id, 11, numbered("d|c", i).c_str()); });
+    return repeated(
+        File().animation().model(10, "n").curveNode(11, 10), count,
+        [](File& file, int id, int i) { file.curve(id).connect(id, 11, numbered("d|c", i).c_str()); });
 }
 std::string curveNodesOfOneProperty(int count) {
-    return repeated(File().animation().model(10, "n"), count,
-                    [](File& file, int id, int) { file.curveNode(id, 10).curve(id + 1).connect(id + 1, id, "d|X"); });
+    return repeated(
+        File().animation().model(10, "n"), count,
+        [](File& file, int id, int) { file.curveNode(id, 10).curve(id + 1).connect(id + 1, id, "d|X"); });
 }
 
 std::string userProperties(int count) {

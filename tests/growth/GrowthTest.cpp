@@ -173,23 +173,32 @@ public:
     std::vector<Cost> ofWalks() {
         {
             std::unique_ptr<LoadedScene> scene;
-            measure("read 7.4 ASCII", [&] { scene = std::make_unique<LoadedScene>(mFile); });
+            measure(
+                "read 7.4 ASCII", [&] { scene = std::make_unique<LoadedScene>(mFile); });
             measure("write 7.5 binary", [&] { scene->write(mBinary, "FBX201600", kBinary); });
         }
-        measure("read 7.5 binary", [&] { const LoadedScene scene(mBinary); });
+        measure(
+            "read 7.5 binary", [&] { const LoadedScene scene(mBinary); });
         measure("info", [&] { EXPECT_EQ(infoOf(mFile), 0); });
         return mCosts;
     }
 
     /// Works that write or look at all properties of each object.
     std::vector<Cost> ofLongWorks() {
-        measure("write 6.1 ASCII", [&] { LoadedScene(mFile).write(mOld, "FBX201000", kAscii); });
-        measure("read 6.1 ASCII", [&] { const LoadedScene scene(mOld); });
-        measure("info of 6.1", [&] { EXPECT_EQ(infoOf(mOld), 0); });
-        measure("dump", [&] { EXPECT_EQ(dumpOf(mFile), 0); });
-        measure("dump of 6.1", [&] { EXPECT_EQ(dumpOf(mOld), 0); });
-        measure("camera, lint and diff", [&] { EXPECT_TRUE(cameraLintAndDiffRun(mFile)); });
-        measure("convert to 6.1", [&] { EXPECT_EQ(convertTo(0, mFile, mOut), 0); });
+        measure(
+            "write 6.1 ASCII", [&] { LoadedScene(mFile).write(mOld, "FBX201000", kAscii); });
+        measure(
+            "read 6.1 ASCII", [&] { const LoadedScene scene(mOld); });
+        measure(
+            "info of 6.1", [&] { EXPECT_EQ(infoOf(mOld), 0); });
+        measure(
+            "dump", [&] { EXPECT_EQ(dumpOf(mFile), 0); });
+        measure(
+            "dump of 6.1", [&] { EXPECT_EQ(dumpOf(mOld), 0); });
+        measure(
+            "camera, lint and diff", [&] { EXPECT_TRUE(cameraLintAndDiffRun(mFile)); });
+        measure(
+            "convert to 6.1", [&] { EXPECT_EQ(convertTo(0, mFile, mOut), 0); });
         measure("convert to 7.5", [&] { EXPECT_EQ(convertTo(5, mFile, mOut), 0); });
         return mCosts;
     }

@@ -124,10 +124,9 @@ bool evaluate(const ufbx_scene& scene, const std::string& file, const json& expe
         if (!there)
             return false;
         std::size_t at = 0;
-        for (const ufbx_node* const node : there->nodes) {
+        for (const ufbx_node* const node : there->nodes)
             if (!node->is_root)
                 describeAt(*node, std::to_string(frame), objects[at++]);
-        }
     }
     return true;
 }
@@ -141,10 +140,9 @@ json look(const std::filesystem::path& path, const json& expected) {
     if (!scene)
         return {};
     json objects = json::array(), warnings = json::array();
-    for (const ufbx_node* const node : scene->nodes) {
+    for (const ufbx_node* const node : scene->nodes)
         if (!node->is_root)
             objects.push_back(describe(*node));
-    }
     for (const ufbx_warning& warning : scene->metadata.warnings)
         warnings.push_back(textOf(warning.description));
     json seen = {{"rate", scene->settings.frames_per_second}, {"warnings", warnings}, {"stacks", json::array()}};

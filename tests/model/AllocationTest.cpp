@@ -27,9 +27,8 @@ void* allocate(std::size_t size) noexcept {
 }
 
 void* allocateOrThrow(std::size_t size) {
-    if (void* memory = allocate(size)) {
+    if (void* memory = allocate(size))
         return memory;
-    }
     throw std::bad_alloc();
 }
 
@@ -167,9 +166,8 @@ TEST(Allocation, KeyingFrameByFrameGrowsGeometrically) {
     TnFbxChannel channel;
 
     const std::size_t allocations = allocationsOf([&] {
-        for (int frame = 0; frame < 1024; ++frame) {
+        for (int frame = 0; frame < 1024; ++frame)
             channel.setValueAt(static_cast<float>(frame), 1.0f);
-        }
     });
 
     EXPECT_EQ(allocations, 11u); // 1, 2, 4, … 1024 samples

@@ -23,12 +23,10 @@ TEST(ChannelEvaluation, HoldsTheEndSamplesOutsideTheRange) {
     TnFbxChannel channel = channelOver(10, {1.0f, 2.0f, 3.0f});
     channel.setValue(99.0f);
 
-    for (const float before : {9.999f, 0.0f, -1e30f, -kInfinity}) {
+    for (const float before : {9.999f, 0.0f, -1e30f, -kInfinity})
         EXPECT_EQ(channel.getAnimatedValue(before), 1.0f) << before;
-    }
-    for (const float after : {12.001f, 1e30f, kInfinity}) {
+    for (const float after : {12.001f, 1e30f, kInfinity})
         EXPECT_EQ(channel.getAnimatedValue(after), 3.0f) << after;
-    }
 }
 
 TEST(ChannelEvaluation, JoinsNeighboursByAStraightLine) {
@@ -80,9 +78,8 @@ TEST(ChannelEvaluation, ExtrapolatesAcrossZeroFromZero) {
 TEST(ChannelEvaluation, GivesTheOnlySampleEverywhere) {
     const TnFbxChannel channel = channelOver(-3, {7.0f});
 
-    for (const float frame : {-kInfinity, -4.0f, -3.0f, -2.5f, 0.0f, kInfinity}) {
+    for (const float frame : {-kInfinity, -4.0f, -3.0f, -2.5f, 0.0f, kInfinity})
         EXPECT_EQ(channel.getAnimatedValue(frame), 7.0f) << frame;
-    }
 }
 
 TEST(ChannelEvaluation, GivesTheStaticValueAtAFrameOfNaN) {

@@ -142,24 +142,22 @@ struct Marker : TnFbxMarker {
 struct OwnerNames {
     template <typename Owner>
     static std::string GetName(int) {
-        if constexpr (std::is_base_of_v<TnFbxCamera, Owner>) {
+        if constexpr (std::is_base_of_v<TnFbxCamera, Owner>)
             return "Camera";
-        } else if constexpr (std::is_base_of_v<TnFbxLight, Owner>) {
+        else if constexpr (std::is_base_of_v<TnFbxLight, Owner>)
             return "Light";
-        } else if constexpr (std::is_base_of_v<TnFbxMarker, Owner>) {
+        else if constexpr (std::is_base_of_v<TnFbxMarker, Owner>)
             return "Marker";
-        } else {
+        else
             return "Transform";
-        }
     }
 };
 
 template <typename Owner>
 std::vector<typename Owner::Channel> allChannels() {
     std::vector<typename Owner::Channel> channels;
-    for (std::size_t i = 0; i < Owner::expected().size(); ++i) {
+    for (std::size_t i = 0; i < Owner::expected().size(); ++i)
         channels.push_back(static_cast<typename Owner::Channel>(i));
-    }
     return channels;
 }
 
@@ -167,9 +165,8 @@ template <typename Owner>
 std::vector<typename Owner::Channel> numbersThatAreNoChannel() {
     const int count = static_cast<int>(Owner::expected().size());
     std::vector<typename Owner::Channel> numbers;
-    for (const int number : {count, count + 1, 255, 256, kHighest, -1, -count, kLowest}) {
+    for (const int number : {count, count + 1, 255, 256, kHighest, -1, -count, kLowest})
         numbers.push_back(static_cast<typename Owner::Channel>(number));
-    }
     return numbers;
 }
 
@@ -229,9 +226,8 @@ TYPED_TEST(ChannelOwner, NumbersNamesAndDefaultsAreThoseOfTheTable) {
 TYPED_TEST(ChannelOwner, StartsWithEveryChannelAtItsDefault) { expectEveryChannelAtItsDefault(TypeParam()); }
 
 TYPED_TEST(ChannelOwner, NamesAreConstantsThatOutliveEveryObject) {
-    for (const auto channel : allChannels<TypeParam>()) {
+    for (const auto channel : allChannels<TypeParam>())
         EXPECT_EQ(TypeParam::getChannelName(channel), TypeParam().getChannelName(channel));
-    }
 }
 
 TYPED_TEST(ChannelOwner, SetsTheStaticValueOfOneChannelAlone) {
@@ -250,9 +246,8 @@ TYPED_TEST(ChannelOwner, SetsTheSamplesOfOneChannelAlone) {
     for (const auto changed : allChannels<TypeParam>()) {
         TypeParam owner;
         EXPECT_TRUE(owner.setValueAt(changed, range(1, 2), {3.0f, 4.0f}));
-        for (const auto channel : allChannels<TypeParam>()) {
+        for (const auto channel : allChannels<TypeParam>())
             EXPECT_EQ(owner.getAnimated(channel), channel == changed);
-        }
         EXPECT_EQ(owner.getValueAt(changed, 1.5f), 3.5f);
     }
 }
@@ -389,9 +384,8 @@ TYPED_TEST(ChannelObjectOwner, ReturnsTheChannelItself) {
 TYPED_TEST(ChannelObjectOwner, ReturnsNoChannelForAnInvalidNumber) {
     TypeParam owner;
 
-    for (const auto channel : numbersThatAreNoChannel<TypeParam>()) {
+    for (const auto channel : numbersThatAreNoChannel<TypeParam>())
         EXPECT_EQ(owner.channelObject(channel), nullptr) << static_cast<int>(channel);
-    }
 }
 
 } // namespace

@@ -30,12 +30,10 @@ TEST(FrameArithmetic, IsExactUpToTheEndsOfAnInt) {
 }
 
 TEST(FrameArithmetic, HoldsAtTheEndsOfAnIntBeyondThem) {
-    for (const float beyond : {2147483648.0f, 1e20f, 3.4e38f, test::kInfinity}) {
+    for (const float beyond : {2147483648.0f, 1e20f, 3.4e38f, test::kInfinity})
         EXPECT_EQ(truncateToInt(beyond), test::kHighest) << beyond;
-    }
-    for (const float beyond : {-2147483904.0f, -1e20f, -3.4e38f, -test::kInfinity}) {
+    for (const float beyond : {-2147483904.0f, -1e20f, -3.4e38f, -test::kInfinity})
         EXPECT_EQ(truncateToInt(beyond), test::kLowest) << beyond;
-    }
 }
 
 TEST(FrameArithmetic, TakesNaNForTheLowestInt) {

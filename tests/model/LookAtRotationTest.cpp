@@ -40,9 +40,8 @@ Floats anglesAlong(Floats direction, Floats up = {0.0f, 1.0f, 0.0f}, float roll 
 }
 
 void expectNear(const Floats& actual, const Floats& expected, float tolerance) {
-    for (std::size_t i = 0; i < 3; ++i) {
+    for (std::size_t i = 0; i < 3; ++i)
         EXPECT_NEAR(actual[i], expected[i], tolerance) << "component " << i;
-    }
 }
 
 constexpr float kFewUlps = 2e-5f; // of angles up to 180, in which one unit in the last place is 1.5e-5
@@ -245,9 +244,8 @@ TEST(LookAtRotation, AHundredThousandCamerasLookWhereTheirAnglesSay) {
                   static_cast<double>(lookAt[2]) - position[2]});
         const bool steep = std::hypot(forward[0], forward[2]) < 0.1;
         const bool upTooClose = distance(cross(forward, unit(toDoubles(up))), {0.0, 0.0, 0.0}) < 0.1;
-        if (steep || upTooClose) {
+        if (steep || upTooClose)
             continue; // there the angles are ill-conditioned; the poles have tests of their own
-        }
         ++checked;
 
         const Result result = convert(position, lookAt, up, roll);

@@ -20,9 +20,8 @@ constexpr std::uint64_t kColourBytes = 16;
 
 /// A triangle of three points, which lie at x.
 void fill(MeshArrays& arrays, float x) {
-    for (int i = 0; i < 3; ++i) {
+    for (int i = 0; i < 3; ++i)
         arrays.addControlPoint({x, 0.0f, 0.0f});
-    }
     arrays.addNormal({0.0f, 1.0f, 0.0f});
 }
 

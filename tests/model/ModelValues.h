@@ -36,9 +36,8 @@ inline TnFbxChannel channelOver(int startFrame, const std::vector<float>& values
 /// The channel's value at every whole frame of its range.
 inline std::vector<float> samplesOf(const TnFbxChannel& channel) {
     std::vector<float> samples;
-    for (int frame = channel.getTime().getStartFrame(); frame <= channel.getTime().getEndFrame(); ++frame) {
+    for (int frame = channel.getTime().getStartFrame(); frame <= channel.getTime().getEndFrame(); ++frame)
         samples.push_back(channel.getAnimatedValue(static_cast<float>(frame)));
-    }
     return samples;
 }
 

@@ -17,9 +17,8 @@ using testing::ElementsAre;
 
 std::vector<int> elementsOf(const SharedArray<int>& array) {
     std::vector<int> elements;
-    for (std::size_t i = 0; i < array.size(); ++i) {
+    for (std::size_t i = 0; i < array.size(); ++i)
         elements.push_back(array[i]);
-    }
     return elements;
 }
 

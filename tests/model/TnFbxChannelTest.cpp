@@ -58,9 +58,8 @@ TEST(TnFbxChannel, StartsStaticAtZero) {
 
     EXPECT_FALSE(channel.getAnimated());
     EXPECT_EQ(channel.getValue(), 0.0f);
-    for (const float frame : {-1e9f, -1.0f, 0.0f, 0.5f, 100.0f, kInfinity, kNaN}) {
+    for (const float frame : {-1e9f, -1.0f, 0.0f, 0.5f, 100.0f, kInfinity, kNaN})
         EXPECT_EQ(channel.getAnimatedValue(frame), 0.0f);
-    }
     expectDefaultTime(channel.getTime());
 }
 

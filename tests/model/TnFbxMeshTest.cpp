@@ -79,9 +79,8 @@ TnFbxMesh twoTriangles() {
 /// Two triangles with every element different.
 TnFbxMesh filledMesh() {
     TnFbxMesh mesh = twoTriangles();
-    for (int polygon = 0; polygon < 2; ++polygon) {
+    for (int polygon = 0; polygon < 2; ++polygon)
         EXPECT_TRUE(mesh.setPolygonVertexSize(polygon, 3 + polygon));
-    }
     for (int i = 0; i < 4; ++i) {
         const float f = static_cast<float>(i);
         EXPECT_TRUE(mesh.setControlPoint(i, f, f + 0.25f, f + 0.5f));
@@ -152,12 +151,10 @@ TEST(TnFbxMesh, AllocatesOneSetOfPointsAndItsPolygonVertices) {
     EXPECT_EQ(mesh.getNumberOfPolygonVertices(), 6);
     EXPECT_EQ(mesh.getNumberOfControlPoints(), 4);
     EXPECT_EQ(mesh.getNumberOfControlPointSets(), 1);
-    for (int polygon = 0; polygon < 2; ++polygon) {
+    for (int polygon = 0; polygon < 2; ++polygon)
         EXPECT_EQ(mesh.getPolygonVertexSize(polygon), 0);
-    }
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         EXPECT_EQ(controlPoint(mesh, i), three(0.0f, 0.0f, 0.0f));
-    }
     for (int i = 0; i < 6; ++i) {
         EXPECT_EQ(mesh.getPointIndex(i), 0);
         EXPECT_EQ(normal(mesh, i), three(0.0f, 0.0f, 0.0f));
@@ -203,12 +200,10 @@ TEST(TnFbxMesh, StoresEveryElementInItsOwnPlace) { expectFilled(filledMesh()); }
 TEST(TnFbxMesh, AnswersABadPolygonWithMinusOneAndABadPolygonVertexWithZero) {
     const TnFbxMesh mesh = filledMesh();
 
-    for (const int polygon : {-1, 2, kLowest, kHighest}) {
+    for (const int polygon : {-1, 2, kLowest, kHighest})
         EXPECT_EQ(mesh.getPolygonVertexSize(polygon), -1) << polygon;
-    }
-    for (const int polygonVertex : {-1, 6, kLowest, kHighest}) {
+    for (const int polygonVertex : {-1, 6, kLowest, kHighest})
         EXPECT_EQ(mesh.getPointIndex(polygonVertex), 0) << polygonVertex;
-    }
 }
 
 TEST(TnFbxMesh, RejectsIndexesOutsideItsArraysAndChangesNothing) {

@@ -44,9 +44,8 @@ constexpr Flag kFlags[] = {
 void expectDefaults(const TnFbxWriteInfo& info) {
     EXPECT_EQ(info.getFileName(), "");
     EXPECT_EQ(info.getAnimationStackName(), "");
-    for (const Flag& flag : kFlags) {
+    for (const Flag& flag : kFlags)
         EXPECT_TRUE((info.*flag.get)()) << flag.name;
-    }
     EXPECT_EQ(info.getFPS(), 24.0f);
     EXPECT_EQ(info.getStartFrame(), 1.0f);
     EXPECT_EQ(info.getEndFrame(), 1.0f);
@@ -59,9 +58,8 @@ TnFbxWriteInfo changedInfo() {
     TnFbxWriteInfo info;
     EXPECT_TRUE(info.setFileName("out.fbx"));
     EXPECT_TRUE(info.setAnimationStackName("Walk"));
-    for (const Flag& flag : kFlags) {
+    for (const Flag& flag : kFlags)
         EXPECT_TRUE((info.*flag.set)(false)) << flag.name;
-    }
     EXPECT_TRUE(info.setFPS(30.0f));
     EXPECT_TRUE(info.setStartFrame(-2.5f));
     EXPECT_TRUE(info.setEndFrame(99.75f));
@@ -73,9 +71,8 @@ TnFbxWriteInfo changedInfo() {
 void expectChanged(const TnFbxWriteInfo& info, TnFbxWriteInfo::eCompatibilityVersion version) {
     EXPECT_EQ(info.getFileName(), "out.fbx");
     EXPECT_EQ(info.getAnimationStackName(), "Walk");
-    for (const Flag& flag : kFlags) {
+    for (const Flag& flag : kFlags)
         EXPECT_FALSE((info.*flag.get)()) << flag.name;
-    }
     EXPECT_EQ(info.getFPS(), 30.0f);
     EXPECT_EQ(info.getStartFrame(), -2.5f);
     EXPECT_EQ(info.getEndFrame(), 99.75f);
@@ -91,9 +88,8 @@ TEST(TnFbxWriteInfo, ChangesOneFlagAtATime) {
     for (const Flag& changed : kFlags) {
         TnFbxWriteInfo info;
         (info.*changed.set)(false);
-        for (const Flag& flag : kFlags) {
+        for (const Flag& flag : kFlags)
             EXPECT_EQ((info.*flag.get)(), &flag != &changed) << changed.name << ", " << flag.name;
-        }
     }
 }
 

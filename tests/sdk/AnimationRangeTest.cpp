@@ -22,9 +22,8 @@ using test::TestScene;
 fbxsdk::FbxNode* addCached(TestScene& scene, const support::TemporaryFolder& folder, const char* name, int firstFrame,
                            int lastFrame, fbxsdk::FbxNode* parent = nullptr) {
     fbxsdk::FbxNode* node = addTriangle(scene, name);
-    if (parent != nullptr) {
+    if (parent != nullptr)
         parent->AddChild(node);
-    }
     FbxCache* cache = FbxCache::Create(scene.scene, name);
     cache->SetCacheFileFormat(FbxCache::eMayaCache);
     cache->SetCacheFileName("", folder.file(std::string(name) + ".xml").c_str());

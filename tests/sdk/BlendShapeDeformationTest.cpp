@@ -57,9 +57,8 @@ struct ShapeScene : TestScene {
                                 int pointCount = 2) {
         auto* shape = fbxsdk::FbxShape::Create(scene, "shape");
         shape->InitControlPoints(pointCount);
-        for (int i = 0; i < pointCount; ++i) {
+        for (int i = 0; i < pointCount; ++i)
             shape->SetControlPointAt(FbxVector4(static_cast<double>(i), offset, 0.0), i);
-        }
         channel->AddTargetShape(shape, fullWeight);
         return shape;
     }
@@ -184,9 +183,8 @@ TEST(BlendShapes, OfAMeshAreThoseOfTheFrameInSinglePrecision) {
     scene.addTarget(channel, 1.0);
     fbxsdk::FbxAnimCurve* curve =
         scene.key(channel->DeformPercent, nullptr, {{0, 5.0f}, {10, 20.0f}, {12, 30.0f}, {14, 40.0f}});
-    for (int key = 0; key < 4; ++key) {
+    for (int key = 0; key < 4; ++key)
         curve->KeySetInterpolation(key, fbxsdk::FbxAnimCurveDef::eInterpolationConstant);
-    }
     const auto heightAt = [&scene](float frame) {
         TnFbxReadInfo info = readAll();
         info.setTransformPoints(false);

@@ -58,9 +58,8 @@ TEST(CameraAim, ComputesTheRotationOnceAtFrameZeroWhenNothingIsAnimated) {
 
     EXPECT_EQ(rotationOf(camera), rotationAt(camera, 0.0f));
     EXPECT_EQ(camera.getTransformValue(kRotationX), 90.0f);
-    for (const auto channel : {kRotationX, kRotationY, kRotationZ}) {
+    for (const auto channel : {kRotationX, kRotationY, kRotationZ})
         EXPECT_FALSE(camera.getTransformAnimated(channel));
-    }
 }
 
 TEST(CameraAim, ComputesTheRotationForEveryFrameOfAnimatedIngredients) {
@@ -70,15 +69,13 @@ TEST(CameraAim, ComputesTheRotationForEveryFrameOfAnimatedIngredients) {
     scene.key(node->LclTranslation, "X", {{0, 0.0f}, {3, 30.0f}});
     scene.key(node->GetCamera()->Roll, nullptr, {{-1, 0.0f}, {2, 90.0f}});
     Camera camera;
-    for (const auto channel : {kRotationX, kRotationY, kRotationZ}) {
+    for (const auto channel : {kRotationX, kRotationY, kRotationZ})
         camera.setTransformValue(channel, 77.0f);
-    }
 
     EXPECT_TRUE(readInto(scene, node, camera, {false, true}));
 
-    for (const auto channel : {kRotationX, kRotationY, kRotationZ}) {
+    for (const auto channel : {kRotationX, kRotationY, kRotationZ})
         test::expectRange(camera.getTransformTime(channel), -1, 3, 24.0f);
-    }
     for (int frame = -1; frame <= 3; ++frame) {
         const auto at = static_cast<float>(frame);
         const Samples expected = rotationAt(camera, at);
@@ -189,18 +186,16 @@ TEST(CameraAim, TakesItsOwnTranslationForTheTargetsWhenReadLocally) {
     const auto lookAt = {Camera::kFbxCameraLookAtPositionX, Camera::kFbxCameraLookAtPositionY,
                          Camera::kFbxCameraLookAtPositionZ};
     Camera camera;
-    for (const auto channel : lookAt) {
+    for (const auto channel : lookAt)
         camera.setValue(channel, 77.0f);
-    }
 
     EXPECT_TRUE(readInto(scene, node, camera));
 
     EXPECT_EQ(samplesOf(camera, Camera::kFbxCameraLookAtPositionX), samplesOf(camera, kPositionX));
     EXPECT_EQ(samplesOf(camera, Camera::kFbxCameraLookAtPositionX), Samples({1.0f, 2.0f, 3.0f}));
     EXPECT_FALSE(camera.getAnimated(Camera::kFbxCameraLookAtPositionY));
-    for (const auto channel : lookAt) {
+    for (const auto channel : lookAt)
         EXPECT_EQ(camera.getValue(channel), 77.0f); // no static values
-    }
     EXPECT_EQ(camera.getTransformRotationOrder(), Transform::kFbxRotationOrderZXY);
 }
 

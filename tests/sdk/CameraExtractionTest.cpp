@@ -268,12 +268,10 @@ TEST(CameraExtraction, WithoutCurvesLeavesEveryChannelUnanimated) {
 
     const Camera camera = readCamera(scene, addCamera(scene));
 
-    for (int i = 0; i <= Camera::kFbxCameraFilmOffsetY; ++i) {
+    for (int i = 0; i <= Camera::kFbxCameraFilmOffsetY; ++i)
         EXPECT_FALSE(camera.getAnimated(static_cast<Camera::EFbxCameraChannelType>(i))) << i;
-    }
-    for (int i = 0; i <= Transform::kFbxTransformPivotZ; ++i) {
+    for (int i = 0; i <= Transform::kFbxTransformPivotZ; ++i)
         EXPECT_FALSE(camera.getTransformAnimated(static_cast<Transform::EFbxTransformChannelType>(i))) << i;
-    }
 }
 
 TEST(CameraExtraction, KeepsWhatTheObjectHeldInChannelsItDoesNotFill) {

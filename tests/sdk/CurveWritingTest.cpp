@@ -54,9 +54,8 @@ TEST(CurveKeys, AreAtEveryFrameOfTheRangeAndLinear) {
     CurveScene scene;
     TnFbxChannel channel;
     Samples samples;
-    for (int frame = 1; frame <= 10; ++frame) {
+    for (int frame = 1; frame <= 10; ++frame)
         samples.push_back(static_cast<float>(frame * frame));
-    }
     channel.setAnimatedValues(timeOf(1, samples.size()), samples);
 
     EXPECT_TRUE(scene.sdk.setCurveValues(scene.curve, &channel, 1.0f));
@@ -172,9 +171,8 @@ TEST(CurveKeys, NeedACurveAndAChannel) {
 /// Static values 1 to 9 in the nine channels that are written, 10 to 15 in skew and pivot.
 Transform numberedTransform() {
     Transform transform;
-    for (int i = Transform::kFbxTransformPositionX; i <= Transform::kFbxTransformPivotZ; ++i) {
+    for (int i = Transform::kFbxTransformPositionX; i <= Transform::kFbxTransformPivotZ; ++i)
         transform.setTransformValue(static_cast<Transform::EFbxTransformChannelType>(i), static_cast<float>(i + 1));
-    }
     return transform;
 }
 
@@ -225,9 +223,8 @@ TEST(TransformWriting, KeysEveryComponentFromItsOwnChannel) {
         {Transform::kFbxTransformRotationZ, 60.0f},
         {Transform::kFbxTransformScaleX, 70.0f},
     };
-    for (const auto& [channel, value] : animated) {
+    for (const auto& [channel, value] : animated)
         transform.setTransformValueAt(channel, timeOf(3, 2), {value, value + 1.0f});
-    }
 
     EXPECT_TRUE(scene.sdk.setTransformCurveValues(scene.node, &transform));
 
@@ -246,9 +243,8 @@ TEST(TransformWriting, KeysEveryComponentAtTheTimesOfItsOwnRange) {
         {Transform::kFbxTransformPositionZ, timeOf(5, 2, 48.0f)}, {Transform::kFbxTransformRotationX, timeOf(0, 4)},
         {Transform::kFbxTransformRotationY, timeOf(0, 2)},
     };
-    for (const auto& [channel, time] : animated) {
+    for (const auto& [channel, time] : animated)
         transform.setTransformValueAt(channel, time, {1.0f, 2.0f, 3.0f, 4.0f});
-    }
 
     EXPECT_TRUE(scene.sdk.setTransformCurveValues(scene.node, &transform));
 

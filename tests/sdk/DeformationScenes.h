@@ -28,9 +28,8 @@ inline FbxAMatrix translation(double x, double y, double z) {
 inline fbxsdk::FbxNode* addPoints(TestScene& scene, int count) {
     fbxsdk::FbxNode* node = scene.add<fbxsdk::FbxMesh>("mesh");
     Points points;
-    for (int i = 0; i < count; ++i) {
+    for (int i = 0; i < count; ++i)
         points.emplace_back(static_cast<double>(i), 0.0, 0.0);
-    }
     fillMesh(*node->GetMesh(), points, {{0, 0, 0}});
     return node;
 }

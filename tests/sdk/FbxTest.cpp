@@ -78,9 +78,8 @@ struct Read {
 
     Names names() const {
         Names all;
-        for (int i = 0; i < count; ++i) {
+        for (int i = 0; i < count; ++i)
             all.push_back(objects[static_cast<std::size_t>(i)].getName());
-        }
         return all;
     }
 

@@ -46,9 +46,8 @@ bool isBinary(const std::string& bytes) { return bytes.rfind("Kaydara FBX Binary
 /// The version in the header of a binary file.
 int versionOf(const std::string& bytes) {
     int version = 0;
-    for (std::size_t i = 4; bytes.size() >= 27 && i-- > 0;) {
+    for (std::size_t i = 4; bytes.size() >= 27 && i-- > 0;)
         version = version * 256 + static_cast<unsigned char>(bytes[23 + i]);
-    }
     return version;
 }
 

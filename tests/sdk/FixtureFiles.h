@@ -65,9 +65,8 @@ inline Samples pointsOf(const TnFbxMesh& mesh) {
 /// The control points of the polygon vertices, one polygon after the other.
 inline std::vector<int> pointIndicesOf(const TnFbxMesh& mesh) {
     std::vector<int> indices;
-    for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
+    for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i)
         indices.push_back(mesh.getPointIndex(i));
-    }
     return indices;
 }
 

@@ -45,9 +45,8 @@ Samples colourOf(const TnFbxMesh& mesh, int polygonVertex) {
 /// The red of all polygon vertices, where the other components are not of interest.
 Samples redsOf(const TnFbxMesh& mesh) {
     Samples all;
-    for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
+    for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i)
         all.push_back(colourOf(mesh, i)[0]);
-    }
     return all;
 }
 
@@ -198,11 +197,9 @@ TEST(PatchesFixture, OfBezierRunThroughTheirOuterPoints) {
 TEST(PatchesFixture, OfTheCardinalKindRunThroughAllTheirPoints) {
     const Samples curve = {0, 0, -0.5f, 4.5f, 0, 8, 4, 9, 8, 8, 8.5f, 4.5f, 8, 0};
     Samples expected;
-    for (const float z : {0.0f, 1.0f}) {
-        for (std::size_t i = 0; i < curve.size(); i += 2) {
+    for (const float z : {0.0f, 1.0f})
+        for (std::size_t i = 0; i < curve.size(); i += 2)
             expected.insert(expected.end(), {curve[i], curve[i + 1], z});
-        }
-    }
     FacadeRead<TnFbxMesh> meshes(fixture("patches_7400_ascii.fbx"));
 
     EXPECT_THAT(pointsOf(meshes["cardinal"]), isNear(expected));

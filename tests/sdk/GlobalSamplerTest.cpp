@@ -51,9 +51,8 @@ TEST(ListsInTheWorld, AnimateTheOneNullThatMovesInALongClip) {
     constexpr int kLast = 20'000;
     const support::MemoryLimitScope limit((kLast + 1) * sizeof(float)); // of the one channel that changes
     TestScene scene(0, kLast);
-    for (int i = 0; i < 100; ++i) {
+    for (int i = 0; i < 100; ++i)
         scene.addNode("still");
-    }
     scene.key(scene.addNode("moving")->LclTranslation, "X", {{0, 10.0f}, {kLast, 1010.0f}});
 
     std::vector<TnFbxNull> nulls = nullsOf(scene);
@@ -73,9 +72,8 @@ TEST(ListsInTheWorld, BakeEveryMeshAtItsFrameHoweverLongTheClip) {
     fbxsdk::FbxNode* mover = scene.addNode("mover");
     scene.key(mover->LclTranslation, "X", {{0, 0.0f}, {kLast, 1000.0f}});
     std::vector<TnFbxMesh> meshes(40);
-    for (std::size_t i = 0; i < meshes.size(); ++i) {
+    for (std::size_t i = 0; i < meshes.size(); ++i)
         mover->AddChild(test::addTriangle(scene, "mesh"));
-    }
     TnFbxReadInfo info = readAll(/*global*/ true);
     info.setFrame(kLast);
     info.setTransformPoints(true);
@@ -98,12 +96,10 @@ public:
         for (int depth = 0; depth < 12; ++depth) {
             parent = addNode("joint", parent);
             parent->LclTranslation.Set({1.0, 0.5 * depth, -2.0});
-            if (depth % 3 == 0) {
+            if (depth % 3 == 0)
                 key(parent->LclRotation, "Z", {{0, 0.0f}, {2500, 700.0f + static_cast<float>(depth)}});
-            }
-            if (depth % 5 == 0) {
+            if (depth % 5 == 0)
                 key(parent->LclScaling, "Y", {{0, 1.0f}, {2500, 1.5f}});
-            }
             addNode("leaf", parent)->LclRotation.Set({10.0 * depth, 20.0, 30.0});
         }
         addNode("aside");
@@ -115,9 +111,8 @@ TEST(ListsInTheWorld, GiveTheSameBitsAsNodesReadOneByOne) {
     std::vector<TnFbxNull> nulls = nullsOf(listed);
     ASSERT_EQ(nulls.size(), 25u);
     std::vector<fbxsdk::FbxNode*> nodes; // from the last one to the first
-    for (int i = single.scene->GetNodeCount() - 1; i >= 0; --i) {
+    for (int i = single.scene->GetNodeCount() - 1; i >= 0; --i)
         nodes.push_back(single.scene->GetNode(i));
-    }
 
     std::size_t compared = 0;
     for (fbxsdk::FbxNode* node : nodes) {
@@ -126,9 +121,8 @@ TEST(ListsInTheWorld, GiveTheSameBitsAsNodesReadOneByOne) {
             const bool isSame = null.getName() == node->GetName() &&
                                 null.getTransformValueAt(kPositionX, 7.0f) == static_cast<float>(place[0]) &&
                                 null.getTransformValueAt(channelAt(1), 7.0f) == static_cast<float>(place[1]);
-            if (!isSame) {
+            if (!isSame)
                 continue;
-            }
             Transform alone;
             fbxsdk::FbxAMatrix geometric;
             TnFbxTime time = single.time();
@@ -145,9 +139,8 @@ TEST(ListsInTheWorld, GiveTheSameBitsAsNodesReadOneByOne) {
 TEST(ListsInTheWorld, FailForWhatMovesBeyondTheLimitAndSayOverWhichFrames) {
     const support::MemoryLimitScope limit(3 * 101 * sizeof(float));
     TestScene scene(0, 100);
-    for (const char* name : {"first", "second", "third", "fourth"}) {
+    for (const char* name : {"first", "second", "third", "fourth"})
         scene.key(scene.addNode(name)->LclTranslation, "X", {{0, 0.0f}, {100, 10.0f}});
-    }
     std::vector<TnFbxNull> nulls(4);
     TnFbxReadInfo info = readAll(/*global*/ true);
 

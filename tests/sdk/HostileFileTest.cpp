@@ -53,11 +53,9 @@ void readEverything(const std::string& file, bool global) {
 
 std::vector<std::filesystem::path> ownFiles() {
     std::vector<std::filesystem::path> files;
-    for (const auto& entry : std::filesystem::recursive_directory_iterator(TARNELL_TEST_DATA)) {
-        if (entry.path().extension() == ".fbx") {
+    for (const auto& entry : std::filesystem::recursive_directory_iterator(TARNELL_TEST_DATA))
+        if (entry.path().extension() == ".fbx")
             files.push_back(entry.path());
-        }
-    }
     return files;
 }
 
@@ -73,9 +71,8 @@ TEST(HostileFile, GivesObjectsOrAReasonWhereverItIsCutOff) {
     constexpr std::size_t kCuts = 40;
     for (const auto& path : ownFiles()) {
         const std::string whole = bytesOf(path);
-        for (std::size_t i = 0; i <= kCuts; ++i) {
+        for (std::size_t i = 0; i <= kCuts; ++i)
             readEverything(folder.write("cut.fbx", whole.substr(0, whole.size() * i / kCuts)), i % 2 == 0);
-        }
     }
 }
 
@@ -86,9 +83,8 @@ TEST(HostileFile, GivesObjectsOrAReasonWhateverByteIsChanged) {
         const std::string whole = bytesOf(path);
         for (int round = 0; round < 60 && !whole.empty(); ++round) {
             std::string damaged = whole;
-            for (int i = 0; i < 3; ++i) {
+            for (int i = 0; i < 3; ++i)
                 damaged[random() % damaged.size()] = static_cast<char>(random());
-            }
             readEverything(folder.write("damaged.fbx", damaged), round % 2 == 0);
         }
     }

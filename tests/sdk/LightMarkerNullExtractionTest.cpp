@@ -300,9 +300,8 @@ TEST(LightMarkerNullExtraction, ReadsTransformsInTheWorldWhenAsked) {
     EXPECT_TRUE(readInto(scene, &FbxSdk::getMarker, scene.add<fbxsdk::FbxMarker>("marker", parent), marker, true));
     EXPECT_TRUE(readInto(scene, &FbxSdk::getNull, scene.add<fbxsdk::FbxNull>("null", parent), null, true));
 
-    for (const TnFbxTransform* object : std::initializer_list<const TnFbxTransform*>{&light, &marker, &null}) {
+    for (const TnFbxTransform* object : std::initializer_list<const TnFbxTransform*>{&light, &marker, &null})
         EXPECT_EQ(object->getTransformValue(TnFbxTransform::kFbxTransformPositionX), 10.0f);
-    }
 }
 
 // ---- Another rate ----
@@ -330,9 +329,8 @@ TEST(LightExtraction, ConvertsKeyFramesToTheSampleRate) {
         });
 
     test::expectRange(light.getTransformTime(kPositionX), 0, 20, 24.0f);
-    for (const auto channel : {Light::kFbxLightRed, Light::kFbxLightIntensity, Light::kFbxLightConeAngle}) {
+    for (const auto channel : {Light::kFbxLightRed, Light::kFbxLightIntensity, Light::kFbxLightConeAngle})
         test::expectRange(light.getTime(channel), 0, 20, 24.0f);
-    }
     EXPECT_EQ(light.getValueAt(Light::kFbxLightConeAngle, 5.0f), 30.0f); // the frames are still those of the scene
 }
 

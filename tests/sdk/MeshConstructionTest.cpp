@@ -26,9 +26,8 @@ Corners cornersOf(const fbxsdk::FbxMesh& mesh) {
     Corners corners;
     for (int polygon = 0; polygon < mesh.GetPolygonCount(); ++polygon) {
         corners.emplace_back();
-        for (int corner = 0; corner < mesh.GetPolygonSize(polygon); ++corner) {
+        for (int corner = 0; corner < mesh.GetPolygonSize(polygon); ++corner)
             corners.back().push_back(mesh.GetPolygonVertex(polygon, corner));
-        }
     }
     return corners;
 }
@@ -37,12 +36,10 @@ Corners cornersOf(const fbxsdk::FbxMesh& mesh) {
 std::unique_ptr<TnFbxMesh> meshOf(const std::vector<int>& sizes, int corners) {
     auto mesh = std::make_unique<TnFbxMesh>();
     EXPECT_TRUE(mesh->allocateGeometryData(static_cast<int>(sizes.size()), corners, corners));
-    for (std::size_t i = 0; i < sizes.size(); ++i) {
+    for (std::size_t i = 0; i < sizes.size(); ++i)
         mesh->setPolygonVertexSize(static_cast<int>(i), sizes[i]);
-    }
-    for (int i = 0; i < corners; ++i) {
+    for (int i = 0; i < corners; ++i)
         mesh->setPointIndex(i, i);
-    }
     return mesh;
 }
 
@@ -129,9 +126,8 @@ TEST(MeshConstruction, WritesTextureCoordinatesByPolygonVertexWithIndicesThatCou
     EXPECT_EQ(uvs->GetDirectArray().GetAt(3)[0], 0.5);
     EXPECT_EQ(uvs->GetDirectArray().GetAt(3)[1], 0.75);
     ASSERT_EQ(uvs->GetIndexArray().GetCount(), 4);
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         EXPECT_EQ(uvs->GetIndexArray().GetAt(i), i);
-    }
 }
 
 TEST(MeshConstruction, WritesColoursByPolygonVertexWithIndicesThatCount) {

@@ -327,9 +327,8 @@ TEST(Skin, PassesOverIndicesThatNameNoPoint) {
     TestScene scene;
     fbxsdk::FbxNode* node = addPoints(scene, 1);
     FbxCluster* cluster = addCluster(scene, addSkin(scene, node), {4.0, 0.0, 0.0});
-    for (const int index : {1, -1, kHighest, -kHighest - 1}) {
+    for (const int index : {1, -1, kHighest, -kHighest - 1})
         cluster->AddControlPointIndex(index, 1.0);
-    }
     cluster->AddControlPointIndex(0, 1.0);
 
     expectPoint(deformed(scene, node)[0], 4.0, 0.0, 0.0);

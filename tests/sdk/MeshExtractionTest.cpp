@@ -32,9 +32,8 @@ TEST(MeshExtraction, ReadsNameTransformLayoutAndPoints) {
     EXPECT_EQ(mesh.getPolygonVertexSize(0), 4);
     EXPECT_EQ(mesh.getPolygonVertexSize(1), 3);
     const int corners[] = {0, 1, 2, 3, 3, 2, 4};
-    for (int i = 0; i < 7; ++i) {
+    for (int i = 0; i < 7; ++i)
         EXPECT_EQ(mesh.getPointIndex(i), corners[i]);
-    }
     EXPECT_EQ(pointOf(mesh, 1), Floats({1.0f, 0.0f, 0.0f}));
     EXPECT_EQ(pointOf(mesh, 4), Floats({0.0f, 2.0f, 0.0f}));
 }

@@ -64,9 +64,8 @@ TEST(MeshNormals, ByPolygonVertexDirect) {
     const TnFbxMesh mesh = readMesh(scene, node);
 
     EXPECT_TRUE(mesh.getValidNormals());
-    for (int i = 0; i < 7; ++i) {
+    for (int i = 0; i < 7; ++i)
         EXPECT_EQ(normalOf(mesh, i), Floats({0.0f, 0.0f, static_cast<float>(i + 1)}));
-    }
 }
 
 TEST(MeshNormals, ByPolygonVertexIndexed) {
@@ -137,9 +136,8 @@ TEST(MeshNormals, BeyondTheirArraysAreZeroAndTheRestIsValid) {
 
     EXPECT_TRUE(mesh.getValidNormals());
     EXPECT_EQ(normalOf(mesh, 0), Floats({0.0f, 0.0f, 2.0f}));
-    for (const int corner : {1, 2, 3}) {
+    for (const int corner : {1, 2, 3})
         EXPECT_EQ(normalOf(mesh, corner), kZero3);
-    }
 }
 
 TEST(MeshNormals, OfLaterLayersAreNotRead) {
@@ -344,9 +342,8 @@ TEST(MeshColours, ComeFromTheMaterialsOfThePolygons) {
 TEST(MeshColours, ComeFromMaterialsByPolygonVertexPointAndNumber) {
     TestScene scene;
     fbxsdk::FbxNode* node = addTwoPolygons(scene);
-    for (int i = 0; i < 7; ++i) {
+    for (int i = 0; i < 7; ++i)
         addLambert<fbxsdk::FbxSurfaceLambert>(scene, node, 0.125 * i, 0.0);
-    }
     setMaterials(node, Element::eByPolygonVertex, Element::eIndexToDirect, {0, 1, 2, 3, 4, 5, 6});
     EXPECT_EQ(colourOf(readMesh(scene, node), 6)[0], 0.75f);
     setMaterials(node, Element::eByControlPoint, Element::eIndexToDirect, {0, 1, 2, 3, 5});

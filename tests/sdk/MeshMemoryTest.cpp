@@ -95,9 +95,8 @@ protected:
     Meshes read(bool sideBySide, bool mirrored) {
         TnFbxReadInfo info =
             test::localRead(mFolder.write("instances.fbx", instances(kInstances, sideBySide, mirrored)));
-        if (GetParam() == kFbxFidelityFaithful) {
+        if (GetParam() == kFbxFidelityFaithful)
             info.setAnimationStackName("");
-        }
         info.setFidelity(GetParam());
         info.setTransformPoints(true);
         info.setGlobalTransform(true);

@@ -79,9 +79,8 @@ inline fbxsdk::FbxNode* addTwoPolygons(TestScene& scene) {
 
 inline fbxsdk::FbxLayer& layerOf(fbxsdk::FbxNode* node, int index = 0) {
     fbxsdk::FbxMesh* mesh = node->GetMesh();
-    while (mesh->GetLayerCount() <= index) {
+    while (mesh->GetLayerCount() <= index)
         mesh->CreateLayer();
-    }
     return *mesh->GetLayer(index);
 }
 
@@ -91,12 +90,10 @@ ElementType* makeElement(fbxsdk::FbxNode* node, Element::EMappingMode mapping, E
     auto* element = ElementType::Create(node->GetMesh(), "");
     element->SetMappingMode(mapping);
     element->SetReferenceMode(reference);
-    for (const Value& value : values) {
+    for (const Value& value : values)
         element->GetDirectArray().Add(value);
-    }
-    for (const int index : indices) {
+    for (const int index : indices)
         element->GetIndexArray().Add(index);
-    }
     return element;
 }
 

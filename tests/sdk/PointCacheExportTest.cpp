@@ -90,11 +90,9 @@ struct CacheScene : WrittenScene {
 /// The names in a folder, in order.
 std::vector<std::string> filesIn(const std::string& folder) {
     std::vector<std::string> names;
-    if (fs::is_directory(folder)) {
-        for (const auto& entry : fs::directory_iterator(folder)) {
+    if (fs::is_directory(folder))
+        for (const auto& entry : fs::directory_iterator(folder))
             names.push_back(entry.path().filename().string());
-        }
-    }
     std::sort(names.begin(), names.end());
     return names;
 }
@@ -329,9 +327,8 @@ TEST(MayaPointCache, HasOneSampleForEveryFrameOfTheRange) {
 
     const std::string data = scene.folder.read("out/shot_fpc/ball.mcx");
     int samples = 0;
-    for (std::size_t at = data.find("MYCH"); at != std::string::npos; at = data.find("MYCH", at + 1)) {
+    for (std::size_t at = data.find("MYCH"); at != std::string::npos; at = data.find("MYCH", at + 1))
         ++samples;
-    }
     EXPECT_EQ(samples, 3);
 }
 

@@ -24,9 +24,8 @@ using testing::StartsWith;
 
 TEST(PointCacheName, IsThatOfTheNodeWhereItIsPlain) {
     for (const char* name : {"ball", "ball 01", "ball.v2", ".ball", "ball_[a] (b) {c} #1 100% 50%x", "Kugel über 球",
-                             "CONE", "NULL", "COM", "COM10", "con_01", "\U0001F3B2"}) {
+                             "CONE", "NULL", "COM", "COM10", "con_01", "\U0001F3B2"})
         EXPECT_EQ(pointCacheName(name), name);
-    }
 }
 
 TEST(PointCacheName, EscapesCharactersThatFileNamesCannotContain) {
@@ -39,9 +38,8 @@ TEST(PointCacheName, EscapesCharactersThatFileNamesCannotContain) {
         {"/root", "%2Froot"},
         {"a\nb\x01\x7F", "a%0Ab%01%7F"},
     };
-    for (const auto& [name, expected] : rows) {
+    for (const auto& [name, expected] : rows)
         EXPECT_EQ(pointCacheName(name), expected);
-    }
 }
 
 TEST(PointCacheName, EscapesDotsAndBlanksAtTheEnd) {
@@ -93,9 +91,8 @@ TEST(PointCacheName, IsCutBetweenCharactersAndEscapes) {
     for (const char* unit : {"\u00FC", "\u7403", "\U0001F3B2", "/"}) {
         for (int before = 0; before < 4; ++before) {
             std::string name(static_cast<std::size_t>(before), 'n');
-            for (int i = 0; i < 300; ++i) {
+            for (int i = 0; i < 300; ++i)
                 name += unit;
-            }
             const std::string shortened = pointCacheName(name);
             const std::string kept = shortened.substr(0, shortened.rfind('~'));
             const std::string piece = pointCacheName(unit);

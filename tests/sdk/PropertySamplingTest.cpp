@@ -342,9 +342,8 @@ TEST(PropertySampling, SurvivesKeysAtTheEndsOfTime) {
     fbxsdk::FbxNode* node = scene.addNode("moving");
     node->LclTranslation.Set({3.0, 0.0, 0.0});
     fbxsdk::FbxAnimCurve* curve = scene.key(node->LclTranslation, "X", {{0, 1.0f}});
-    for (const fbxsdk::FbxTime time : {fbxsdk::FBXSDK_TIME_MINUS_INFINITE, fbxsdk::FBXSDK_TIME_INFINITE}) {
+    for (const fbxsdk::FbxTime time : {fbxsdk::FBXSDK_TIME_MINUS_INFINITE, fbxsdk::FBXSDK_TIME_INFINITE})
         curve->KeySet(curve->KeyAdd(time), time, 1.0f);
-    }
 
     const Transform transform = localTransform(scene, node, scene.time());
 

@@ -53,24 +53,20 @@ TEST(ReadWarnings, NameMeshesWhoseCacheIsMissing) {
     FacadeRead<TnFbxMesh> meshes(localRead(copy.file()));
 
     EXPECT_GT(meshes.count, 0);
-    for (const std::string& name : meshes.names()) {
+    for (const std::string& name : meshes.names())
         EXPECT_THAT(lastWarnings(), says(copy.file(), name, "read without its point cache: "));
-    }
 }
 
 TEST(ReadWarnings, NameMeshesWhoseCacheIsDamaged) {
     const CopiedCaches copy;
-    for (const auto& entry : std::filesystem::recursive_directory_iterator(copy.folder.file("caches"))) {
-        if (entry.is_regular_file()) {
+    for (const auto& entry : std::filesystem::recursive_directory_iterator(copy.folder.file("caches")))
+        if (entry.is_regular_file())
             std::filesystem::resize_file(entry.path(), entry.file_size() / 2);
-        }
-    }
 
     FacadeRead<TnFbxMesh> meshes(localRead(copy.file()));
 
-    for (const std::string& name : meshes.names()) {
+    for (const std::string& name : meshes.names())
         EXPECT_THAT(lastWarnings(), says(copy.file(), name, "read without its point cache: "));
-    }
 }
 
 TEST(ReadWarnings, NameMeshesThatAreDroppedBecauseTheirNameOccursTwice) {
@@ -93,7 +89,7 @@ TEST(ReadWarnings, NameSurfacesThatAreCountedButNotRead) {
     TnFbxReadInfo info = readAll();
     TnFbxNull nulls[2];
     EXPECT_TRUE(scene.sdk.getNulls(info, nulls, 2));
-    EXPECT_THAT(lastWarnings(), Contains(HasSubstr("1 NURBS surfaces are counted but not read")));
+    EXPECT_THAT(lastWarnings(), Contains(HasSubstr("1 NURBS surface is counted but not read")));
 
     info.setAllObjects(false);
     info.setObjectName("surface");
@@ -124,9 +120,8 @@ protected:
     static TnFbxReadInfo info(const std::string& file) {
         TnFbxReadInfo info = localRead(file);
         info.setFidelity(GetParam());
-        if (GetParam() == kFbxFidelityFaithful) {
+        if (GetParam() == kFbxFidelityFaithful)
             info.setAnimationStackName("");
-        }
         return info;
     }
 

@@ -31,9 +31,8 @@ template <class Object>
 Object placed(const char* name) {
     Object object;
     object.setName(name);
-    for (int i = Transform::kFbxTransformPositionX; i <= Transform::kFbxTransformScaleZ; ++i) {
+    for (int i = Transform::kFbxTransformPositionX; i <= Transform::kFbxTransformScaleZ; ++i)
         object.setTransformValue(static_cast<Transform::EFbxTransformChannelType>(i), 0.5f + static_cast<float>(i));
-    }
     object.setTransformValueAt(Transform::kFbxTransformPositionY, timeOf(0, 4), {1.0f, 3.0f, 2.0f, -0.1f});
     object.setTransformValueAt(Transform::kFbxTransformRotationZ, timeOf(0, 4), {0.0f, 370.0f, -45.5f, 1e-3f});
     object.setTransformValueAt(Transform::kFbxTransformScaleX, timeOf(0, 4), {1.0f, 1.5f, 0.0f, 2.0f});
@@ -127,9 +126,8 @@ TEST_P(RoundTrip, OfEveryRotationOrder) {
     write(objects);
 
     FacadeRead<TnFbxNull> read(file());
-    for (std::size_t i = 0; i < nulls.size(); ++i) {
+    for (std::size_t i = 0; i < nulls.size(); ++i)
         EXPECT_EQ(read["order" + std::to_string(i)].getTransformRotationOrder(), static_cast<int>(i));
-    }
 }
 
 TEST_P(RoundTrip, OfALightOfEveryType) {
@@ -288,9 +286,8 @@ std::unique_ptr<TnFbxMesh> filledMesh() {
         mesh->setUV(i, f / 7.0f, 1.0f - f / 7.0f);
         mesh->setColour(i, f / 7.0f, 0.2f, 0.3f, 0.4f);
     }
-    for (int i = 0; i < 5; ++i) {
+    for (int i = 0; i < 5; ++i)
         mesh->setControlPoint(i, static_cast<float>(i) * 0.1f, 1e6f, static_cast<float>(-i) / 3.0f);
-    }
     mesh->setValidNormals(true);
     mesh->setValidUVs(true);
     mesh->setValidColours(true);
@@ -303,9 +300,8 @@ using Numbers = std::vector<std::array<float, 4>>;
 template <class Get>
 Numbers cornersOf(const TnFbxMesh& mesh, Get get) {
     Numbers numbers(static_cast<std::size_t>(mesh.getNumberOfPolygonVertices()));
-    for (std::size_t i = 0; i < numbers.size(); ++i) {
+    for (std::size_t i = 0; i < numbers.size(); ++i)
         get(static_cast<int>(i), numbers[i]);
-    }
     return numbers;
 }
 
@@ -322,9 +318,8 @@ TEST_P(RoundTrip, OfAMeshWithoutItsEmptyPolygon) {
     EXPECT_EQ(read.getPolygonVertexSize(0), 4);
     EXPECT_EQ(read.getPolygonVertexSize(1), 3);
     ASSERT_EQ(read.getNumberOfPolygonVertices(), 7);
-    for (int i = 0; i < 7; ++i) {
+    for (int i = 0; i < 7; ++i)
         EXPECT_EQ(read.getPointIndex(i), source->getPointIndex(i));
-    }
     ASSERT_EQ(read.getNumberOfControlPoints(), 5);
     for (int i = 0; i < 5; ++i) {
         float a[3] = {}, b[3] = {};
@@ -333,10 +328,12 @@ TEST_P(RoundTrip, OfAMeshWithoutItsEmptyPolygon) {
         EXPECT_THAT(b, testing::ElementsAreArray(a));
     }
     const auto normals = [](const TnFbxMesh& mesh) {
-        return cornersOf(mesh, [&mesh](int i, auto& n) { EXPECT_TRUE(mesh.getNormal(i, n[0], n[1], n[2])); });
+        return cornersOf(
+            mesh, [&mesh](int i, auto& n) { EXPECT_TRUE(mesh.getNormal(i, n[0], n[1], n[2])); });
     };
     const auto uvs = [](const TnFbxMesh& mesh) {
-        return cornersOf(mesh, [&mesh](int i, auto& n) { EXPECT_TRUE(mesh.getUV(i, n[0], n[1])); });
+        return cornersOf(
+            mesh, [&mesh](int i, auto& n) { EXPECT_TRUE(mesh.getUV(i, n[0], n[1])); });
     };
     const auto colours = [](const TnFbxMesh& mesh) {
         return cornersOf(mesh, [&mesh](int i, auto& n) { EXPECT_TRUE(mesh.getColour(i, n[0], n[1], n[2], n[3])); });

@@ -103,9 +103,8 @@ TEST(SceneConstruction, WritesOnlyTheRequestedKinds) {
     OneOfEachKind one;
     for (const auto& [wanted, name] : flags) {
         TnFbxWriteInfo info = writeInfo();
-        for (const auto& flag : flags) {
+        for (const auto& flag : flags)
             (info.*flag.first)(flag.first == wanted);
-        }
         WrittenScene scene;
         EXPECT_TRUE(scene.create(one.objects, info));
         EXPECT_THAT(scene.childNames(), ElementsAre(name));

@@ -29,9 +29,8 @@ Names namesOf(TestScene& scene, long mask) {
 template <class Object>
 Names namesOf(const std::vector<Object>& objects) {
     Names names;
-    for (const Object& object : objects) {
+    for (const Object& object : objects)
         names.push_back(object.getName());
-    }
     return names;
 }
 
@@ -108,9 +107,8 @@ TEST(NodeCounts, SelectEveryAttributeTypeByItsBit) {
     for (const Row& row : rows) {
         TestScene scene;
         row.add(scene, "node");
-        for (int bit = 1; bit <= 0x8000; bit *= 2) {
+        for (int bit = 1; bit <= 0x8000; bit *= 2)
             EXPECT_EQ(scene.sdk.getNumberOfNodeTypes(bit), bit == row.bit ? 1 : 0) << std::hex << bit << ' ' << row.bit;
-        }
     }
 }
 
@@ -493,9 +491,8 @@ TEST(Lists, WalkTreesThatAreDeeperThanTheStackOfCalls) {
     TestScene scene;
     fbxsdk::FbxNode* node = nullptr;
     constexpr int kDepth = 20000;
-    for (int i = 0; i < kDepth; ++i) {
+    for (int i = 0; i < kDepth; ++i)
         node = scene.addNode("deep", node);
-    }
 
     EXPECT_EQ(scene.sdk.getNumberOfNulls(), kDepth);
     EXPECT_EQ(namesOf(scene, kNulls).size(), static_cast<std::size_t>(kDepth));

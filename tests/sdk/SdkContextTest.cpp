@@ -60,9 +60,8 @@ fbxsdk::FbxNode* addPatch(TestScene& scene, const char* name, fbxsdk::FbxNode* p
     fbxsdk::FbxNode* node = scene.add<fbxsdk::FbxPatch>(name, parent);
     fbxsdk::FbxPatch& patch = *fbxsdk::FbxCast<fbxsdk::FbxPatch>(node->GetNodeAttribute());
     patch.InitControlPoints(2, fbxsdk::FbxPatch::eLinear, 2, fbxsdk::FbxPatch::eLinear);
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         patch.SetControlPointAt(kUnitSquare[i], i);
-    }
     return node;
 }
 
@@ -76,9 +75,8 @@ fbxsdk::FbxNode* addNurbsSurface(TestScene& scene, const char* name) {
     const double knots[] = {0.0, 0.0, 1.0, 1.0};
     std::copy(std::begin(knots), std::end(knots), surface.GetUKnotVector());
     std::copy(std::begin(knots), std::end(knots), surface.GetVKnotVector());
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         surface.SetControlPointAt(kUnitSquare[i], i);
-    }
     return node;
 }
 

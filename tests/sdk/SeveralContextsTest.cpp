@@ -104,9 +104,8 @@ TEST(ReadsOverTheMemoryLimit, HandOutTheArrayAndNameTheFileTheFramesAndTheLimit)
         ASSERT_EQ(count, 1);
         ASSERT_NE(nulls, nullptr);
         EXPECT_FALSE(nulls[0].getTransformAnimated(TnFbxTransform::kFbxTransformPositionX));
-        for (const std::string& part : {file, std::string("frames 0 to 24000 at 24"), std::string("64.0 KiB")}) {
+        for (const std::string& part : {file, std::string("frames 0 to 24000 at 24"), std::string("64.0 KiB")})
             EXPECT_NE(lastError().find(part), std::string::npos) << part << " in " << lastError();
-        }
     }
 }
 

@@ -37,11 +37,9 @@ Lists seededLists() {
     std::mt19937 random(11);
     Lists lists(kBones);
     for (int point = 0; point < kPoints; ++point) {
-        for (auto& list : lists) {
-            if (random() % 2 == 0) {
+        for (auto& list : lists)
+            if (random() % 2 == 0)
                 list.push_back({point, static_cast<double>(random() % 1000) / 700.0});
-            }
-        }
     }
     return lists;
 }
@@ -58,9 +56,8 @@ public:
         test::fillMesh(*mNode->GetMesh(), mRest, {{0, 1, 2}});
         fbxsdk::FbxSkin* skin = fbxsdk::FbxSkin::Create(mScene.scene, "skin");
         mNode->GetMesh()->AddDeformer(skin);
-        for (int bone = 0; bone < kBones; ++bone) {
+        for (int bone = 0; bone < kBones; ++bone)
             skin->AddCluster(makeCluster(bone));
-        }
     }
 
     /// The library's result for the points.
@@ -83,9 +80,8 @@ public:
         for (std::size_t bone = 0; bone < mLists.size(); ++bone) {
             const FbxAMatrix motion = mBones[bone]->EvaluateGlobalTransform(test::timeOfFrame(0));
             for (const Influence& influence : mLists[bone]) {
-                if (influence.point < 0 || influence.point >= kPoints || influence.weight < 1e-5) {
+                if (influence.point < 0 || influence.point >= kPoints || influence.weight < 1e-5)
                     continue;
-                }
                 const auto point = static_cast<std::size_t>(influence.point);
                 FbxAMatrix scaled = (motion.Inverse() * FbxAMatrix()).Inverse() * FbxAMatrix();
                 mScene.sdk.matrixScale(scaled, influence.weight);
@@ -99,11 +95,9 @@ public:
             }
         }
         Points points = mRest;
-        for (std::size_t i = 0; i < points.size(); ++i) {
-            if (totals[i] > 0.0) {
+        for (std::size_t i = 0; i < points.size(); ++i)
+            if (totals[i] > 0.0)
                 points[i] = placed(sums[i], totals[i], points[i]);
-            }
-        }
         return points;
     }
 
@@ -115,18 +109,16 @@ private:
         FbxCluster* cluster = FbxCluster::Create(mScene.scene, "cluster");
         cluster->SetLink(node);
         cluster->SetLinkMode(mMode);
-        for (const Influence& influence : mLists[static_cast<std::size_t>(bone)]) {
+        for (const Influence& influence : mLists[static_cast<std::size_t>(bone)])
             cluster->AddControlPointIndex(influence.point, influence.weight);
-        }
         mBones.push_back(node);
         return cluster;
     }
 
     [[nodiscard]] FbxVector4 placed(const FbxAMatrix& sum, double total, const FbxVector4& rest) const {
         const FbxVector4 moved = sum.MultT(rest);
-        if (mMode == FbxCluster::eAdditive) {
+        if (mMode == FbxCluster::eAdditive)
             return moved;
-        }
         return mMode == FbxCluster::eNormalize ? moved / total : moved + rest * (1.0 - total);
     }
 
@@ -141,9 +133,8 @@ private:
 /// The first point with other bits, or the number of points.
 std::size_t firstDifference(const Points& a, const Points& b) {
     std::size_t i = 0;
-    while (i < a.size() && i < b.size() && std::memcmp(&a[i], &b[i], sizeof(FbxVector4)) == 0) {
+    while (i < a.size() && i < b.size() && std::memcmp(&a[i], &b[i], sizeof(FbxVector4)) == 0)
         ++i;
-    }
     return i;
 }
 

@@ -27,9 +27,8 @@ TEST_P(TimeRoundTrip, OfAnimationAtEveryRateKeepsFramesAndValues) {
         TnFbxNull null;
         null.setName("null");
         Samples samples;
-        for (int i = 0; i < 100; ++i) {
+        for (int i = 0; i < 100; ++i)
             samples.push_back(static_cast<float>(i * i));
-        }
         null.setTransformValueAt(Transform::kFbxTransformPositionX, timeOf(0, samples.size(), rate), samples);
         WrittenObjects objects;
         objects.nulls = {&null};

@@ -120,9 +120,8 @@ TEST(RotationOrders, ReadSphericAsXYZ) {
 
 TEST(RotationOrders, FallBackToZXYInBothDirections) {
     FbxSdk sdk;
-    for (const int number : {7, 99, -1}) {
+    for (const int number : {7, 99, -1})
         EXPECT_EQ(sdk.getRotationOrderConstant(static_cast<Euler::EOrder>(number)), Transform::kFbxRotationOrderZXY);
-    }
     for (const int number : {6, 7, 99, -1}) {
         EXPECT_EQ(sdk.getRotationOrderConstant(static_cast<Transform::EFbxTransformRotationOrder>(number)),
                   Euler::eOrderZXY);
@@ -154,11 +153,9 @@ TEST(ExtractMatrixRotation, GivesAnglesThatApplyInTheOrderZXY) {
         const FbxAMatrix back = rotation(0.0, static_cast<double>(angles.y), 0.0) *
                                 rotation(static_cast<double>(angles.x), 0.0, 0.0) *
                                 rotation(0.0, 0.0, static_cast<double>(angles.z));
-        for (int row = 0; row < 3; ++row) {
-            for (int column = 0; column < 3; ++column) {
+        for (int row = 0; row < 3; ++row)
+            for (int column = 0; column < 3; ++column)
                 ASSERT_NEAR(back.Get(row, column), matrix.Get(row, column), 1e-5);
-            }
-        }
     }
 }
 
@@ -504,9 +501,8 @@ TEST(GlobalValues, HoldOneValuePerFrame) {
 
     EXPECT_TRUE(all.result);
     EXPECT_EQ(all.values[2], Samples({0.0f, 0.0f, 0.0f, 1.0f, 2.0f, 3.0f}));
-    for (const Samples& samples : all.values) {
+    for (const Samples& samples : all.values)
         EXPECT_EQ(samples.size(), 6u);
-    }
 }
 
 TEST(GlobalValues, AreTakenAtFrameByRateSeconds) {
@@ -524,9 +520,8 @@ TEST(GlobalValues, AreEmptiedForAnInvertedRangeAndForANullNode) {
     for (const GlobalValues& all : {globalValues(scene, scene.addNode("node"), timeRecord(1, 0)),
                                     globalValues(scene, nullptr, timeRecord(0, 1))}) {
         EXPECT_FALSE(all.result);
-        for (const Samples& samples : all.values) {
+        for (const Samples& samples : all.values)
             EXPECT_TRUE(samples.empty());
-        }
     }
 }
 
@@ -540,9 +535,8 @@ TEST(GlobalValues, AreNoneForARangeOverTheMemoryLimit) {
         const GlobalValues all = globalValues(scene, node, time);
         EXPECT_FALSE(all.result);
         EXPECT_NE(lastError().find("the limit is 1.0 MiB"), std::string::npos) << lastError();
-        for (const Samples& samples : all.values) {
+        for (const Samples& samples : all.values)
             EXPECT_TRUE(samples.empty());
-        }
     }
     EXPECT_TRUE(globalValues(scene, node, timeRecord(1, (1 << 18) / 9)).result);
 }
@@ -582,9 +576,8 @@ TEST(GlobalValues, SurviveARateOfZeroAndOneThatIsNoNumber) {
     TestScene scene(0, 0);
     fbxsdk::FbxNode* node = scene.addNode("node");
     scene.key(node->LclTranslation, "X", {{0, 1.0f}, {24, 2.0f}});
-    for (const float rate : {0.0f, -24.0f, std::numeric_limits<float>::quiet_NaN()}) {
+    for (const float rate : {0.0f, -24.0f, std::numeric_limits<float>::quiet_NaN()})
         EXPECT_EQ(globalValues(scene, node, timeRecord(0, 2, rate)).values[0].size(), 3u);
-    }
 }
 
 // ---- Geometric offset and default values ----

@@ -25,9 +25,8 @@ constexpr auto kX = TnFbxTransform::kFbxTransformPositionX;
 /// The text of a fixture, with every occurrence of a piece replaced; there must be one.
 std::string changed(std::string text, const std::string& piece, const std::string& by) {
     EXPECT_NE(text.find(piece), std::string::npos) << piece;
-    for (std::size_t at = text.find(piece); at != std::string::npos; at = text.find(piece, at + by.size())) {
+    for (std::size_t at = text.find(piece); at != std::string::npos; at = text.find(piece, at + by.size()))
         text.replace(at, piece.size(), by);
-    }
     return text;
 }
 
@@ -112,9 +111,8 @@ TnFbxTime writtenAndRead(float rate, int first, int last, TnFbxWriteInfo::eCompa
     TnFbxTime time;
     time.setTime(0.0f, first, last, rate);
     std::vector<float> samples;
-    for (int frame = first; frame <= last; ++frame) {
+    for (int frame = first; frame <= last; ++frame)
         samples.push_back(static_cast<float>(frame));
-    }
     EXPECT_TRUE(null.setTransformValueAt(kX, time, samples));
     TnFbxWriteInfo info;
     info.setFileName(folder.file("a.fbx"));
@@ -124,9 +122,8 @@ TnFbxTime writtenAndRead(float rate, int first, int last, TnFbxWriteInfo::eCompa
     EXPECT_TRUE(Fbx().writeFile(info, {}, {}, {}, {&null}, {})) << lastError();
     FacadeRead<TnFbxNull> nulls(localRead(folder.file("a.fbx")));
     const TnFbxTime read = nulls["node"].getTransformTime(kX);
-    for (int frame = first; frame <= last && read.getStartFrame() == first; ++frame) {
+    for (int frame = first; frame <= last && read.getStartFrame() == first; ++frame)
         EXPECT_NEAR(nulls["node"].getTransformValueAt(kX, static_cast<float>(frame)), static_cast<float>(frame), 1e-3f);
-    }
     return read;
 }
 

@@ -141,9 +141,8 @@ void addShape(TestScene& scene, fbxsdk::FbxNode& node) {
     auto* channel = fbxsdk::FbxBlendShapeChannel::Create(scene.scene, "channel");
     auto* target = fbxsdk::FbxShape::Create(scene.scene, "target");
     target->InitControlPoints(mesh.GetControlPointsCount());
-    for (int i = 0; i < mesh.GetControlPointsCount(); ++i) {
+    for (int i = 0; i < mesh.GetControlPointsCount(); ++i)
         target->SetControlPointAt(mesh.GetControlPointAt(i) + FbxVector4(0.0, 2.0, 0.0), i);
-    }
     mesh.AddDeformer(deformer);
     deformer->AddBlendShapeChannel(channel);
     channel->AddTargetShape(target, 100.0);

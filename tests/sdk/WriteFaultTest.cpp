@@ -44,9 +44,8 @@ std::atomic<bool> gHasQuietlyFailed{false}; ///< without an exception, which som
 
 void* allocate(std::size_t size) noexcept {
     const long number = gAllocations++;
-    if (number >= gFirstFailing && number < gFirstWorkingAgain) {
+    if (number >= gFirstFailing && number < gFirstWorkingAgain)
         return nullptr;
-    }
     void* memory = std::malloc(size != 0 ? size : 1);
     gLive += memory != nullptr ? 1 : 0;
     return memory;
@@ -59,9 +58,8 @@ void* allocateQuietly(std::size_t size) noexcept {
 }
 
 void* allocateOrThrow(std::size_t size) {
-    if (void* memory = allocate(size)) {
+    if (void* memory = allocate(size))
         return memory;
-    }
     throw std::bad_alloc();
 }
 
@@ -177,23 +175,20 @@ protected:
     /// The files of the cache; the first one comes first.
     static Names cacheNames() {
         const Layout& layout = GetParam();
-        if (!layout.mayaCache) {
+        if (!layout.mayaCache)
             return {"waving.pc2"};
-        }
         return {layout.version == TnFbxWriteInfo::kFbxVersion2016 ? "waving.mcx" : "waving.mc", "waving.xml"};
     }
     Names cacheContents() const {
         Names contents;
-        for (const std::string& name : cacheNames()) {
+        for (const std::string& name : cacheNames())
             contents.push_back(folder.read("shot_fpc/" + name));
-        }
         return contents;
     }
     void writeOldFiles() const {
         folder.write("shot.fbx", "old");
-        for (const std::string& name : cacheNames()) {
+        for (const std::string& name : cacheNames())
             folder.write("shot_fpc/" + name, "old " + name);
-        }
     }
     /// The files of a write without faults.
     void writeReference() {
@@ -315,13 +310,11 @@ TEST_P(WriteFault, InAnyAllocationLeavesTheOldFileAndNothingElse) {
                 writeOldFiles();
                 continue;
             }
-            if (outcome == Outcome::eRefused) {
+            if (outcome == Outcome::eRefused)
                 EXPECT_FALSE(lastError().empty());
-            }
             expectOldFiles();
-            if (HasFailure()) {
+            if (HasFailure())
                 return; // the others would repeat the same hundreds of times
-            }
         }
     }
 }
@@ -348,17 +341,15 @@ Report writtenWithin(rlim_t bytes, const Action& action) {
         ::dup2(nowhere, STDOUT_FILENO); // a cache that cannot be opened is reported there
         const bool written = action();
         std::string text = (written ? "1" : "0") + lastError();
-        for (const std::string& warning : lastWarnings()) {
+        for (const std::string& warning : lastWarnings())
             text += '\n' + warning;
-        }
         ::_exit(::write(pipe[1], text.data(), text.size()) == static_cast<ssize_t>(text.size()) ? 0 : 1);
     }
     ::close(pipe[1]);
     std::string text;
     char piece[256];
-    for (ssize_t count = 0; (count = ::read(pipe[0], piece, sizeof piece)) > 0;) {
+    for (ssize_t count = 0; (count = ::read(pipe[0], piece, sizeof piece)) > 0;)
         text.append(piece, static_cast<std::size_t>(count));
-    }
     ::close(pipe[0]);
     int status = -1;
     EXPECT_EQ(::waitpid(child, &status, 0), child);
@@ -394,9 +385,8 @@ TEST_P(WriteFault, OfAMediumThatIsFullAtAnySizeLeavesTheOldFile) {
     writeReference();
     constexpr std::size_t kSteps = 40;
     std::vector<std::size_t> sizes = {0, 1, 30, 31, 32, 33, 100, 500, completeSize - 1, completeSize, completeSize + 1};
-    for (std::size_t step = 1; step < kSteps; ++step) {
+    for (std::size_t step = 1; step < kSteps; ++step)
         sizes.push_back(completeSize * step / kSteps);
-    }
 
     for (const std::size_t size : sizes) {
         SCOPED_TRACE("room for " + std::to_string(size) + " bytes");
@@ -426,9 +416,8 @@ TEST_P(WriteFault, OfTheCacheOnAMediumThatIsFullWritesTheMeshWithoutItAndSaysSo)
         SCOPED_TRACE(replacing ? "replacing" : "alone");
         fs::remove_all(folder.file("shot_fpc"));
         folder.write("shot.fbx", "old");
-        if (replacing) {
+        if (replacing)
             writeOldFiles();
-        }
 
         const Report report = writtenWithin(sceneSize, [this] { return write(); });
 

@@ -17,9 +17,8 @@ public:
     AsNobody(const AsNobody&) = delete;
     AsNobody& operator=(const AsNobody&) = delete;
     ~AsNobody() {
-        if (mChanged) {
+        if (mChanged)
             EXPECT_EQ(::seteuid(0), 0);
-        }
     }
 
 private:

@@ -47,11 +47,10 @@ public:
         return *this;
     }
     BinaryRecordBuilder& end() {
-        if (mOpen.back().hasBlock) {
+        if (mOpen.back().hasBlock)
             nullRecord();
-        } else {
+        else
             closeValues();
-        }
         const OpenRecord& record = mOpen.back();
         patch(record.start, 0, record.endLost ? 0 : mBytes.size());
         mOpen.pop_back();
@@ -119,9 +118,8 @@ public:
         for (const Number number : numbers) {
             char element[sizeof number];
             std::memcpy(element, &number, sizeof number);
-            if (mOrder == ByteOrder::big) {
+            if (mOrder == ByteOrder::big)
                 std::reverse(std::begin(element), std::end(element));
-            }
             result.append(element, sizeof element);
         }
         return result;

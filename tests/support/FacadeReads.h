@@ -65,20 +65,17 @@ struct FacadeRead {
 
     /// The object of that name; a new one, and a failure of the test, when there is none.
     Object& operator[](const std::string& name) {
-        for (int i = 0; i < count; ++i) {
-            if (objects[static_cast<std::size_t>(i)].getName() == name) {
+        for (int i = 0; i < count; ++i)
+            if (objects[static_cast<std::size_t>(i)].getName() == name)
                 return objects[static_cast<std::size_t>(i)];
-            }
-        }
         ADD_FAILURE() << "there is no object \"" << name << '"';
         return none;
     }
 
     std::vector<std::string> names() const {
         std::vector<std::string> all;
-        for (int i = 0; i < count; ++i) {
+        for (int i = 0; i < count; ++i)
             all.push_back(objects[static_cast<std::size_t>(i)].getName());
-        }
         return all;
     }
 

@@ -54,13 +54,11 @@ private:
         break;
     }
     std::vector<double> numbers(record.numberCount());
-    if (!record.readNumbers(std::span(numbers))) {
+    if (!record.readNumbers(std::span(numbers)))
         return "[corrupt]";
-    }
     std::string result = "[";
-    for (const double number : numbers) {
+    for (const double number : numbers)
         result += (result.size() > 1 ? " " : "") + realText(number);
-    }
     return result + "]";
 }
 
@@ -69,9 +67,8 @@ private:
     for (const fbxsdk::detail::Record& record : parent.children()) {
         result += result.empty() ? "" : " ";
         result += std::string(record.name) + ":";
-        for (const fbxsdk::detail::Value& value : record.values) {
+        for (const fbxsdk::detail::Value& value : record.values)
             result += (&value == record.values.data() ? " " : ", ") + valueText(record, value);
-        }
         if (record.hasBlock) {
             const std::string block = recordsText(record);
             result += block.empty() ? " { }" : " { " + block + " }";

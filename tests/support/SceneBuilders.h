@@ -111,14 +111,12 @@ inline TnFbxReadInfo readNamed(const char* name, bool global = false) {
 inline void fillMesh(fbxsdk::FbxMesh& mesh, const std::vector<fbxsdk::FbxVector4>& points,
                      const std::vector<std::vector<int>>& polygons) {
     mesh.InitControlPoints(static_cast<int>(points.size()));
-    for (std::size_t i = 0; i < points.size(); ++i) {
+    for (std::size_t i = 0; i < points.size(); ++i)
         mesh.SetControlPointAt(points[i], static_cast<int>(i));
-    }
     for (const std::vector<int>& polygon : polygons) {
         mesh.BeginPolygon();
-        for (const int index : polygon) {
+        for (const int index : polygon)
             mesh.AddPolygon(index);
-        }
         mesh.EndPolygon();
     }
 }
@@ -137,14 +135,12 @@ std::vector<float> samplesOf(const Object& object, Channel channel) {
     std::vector<float> samples;
     if constexpr (ofTransform) {
         const TnFbxTime time = object.getTransformTime(channel);
-        for (int f = time.getStartFrame(); object.getTransformAnimated(channel) && f <= time.getEndFrame(); ++f) {
+        for (int f = time.getStartFrame(); object.getTransformAnimated(channel) && f <= time.getEndFrame(); ++f)
             samples.push_back(object.getTransformValueAt(channel, static_cast<float>(f)));
-        }
     } else {
         const TnFbxTime time = object.getTime(channel);
-        for (int f = time.getStartFrame(); object.getAnimated(channel) && f <= time.getEndFrame(); ++f) {
+        for (int f = time.getStartFrame(); object.getAnimated(channel) && f <= time.getEndFrame(); ++f)
             samples.push_back(object.getValueAt(channel, static_cast<float>(f)));
-        }
     }
     return samples;
 }

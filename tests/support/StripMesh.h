@@ -22,9 +22,8 @@ inline constexpr int kLongStrip = 12'000;
 /// Squares in a row, with normals, texture coordinates and colours of many digits.
 inline void fillStrip(TnFbxMesh& mesh, int squares) {
     ASSERT_TRUE(mesh.allocateGeometryData(squares, 2 * squares + 2, 4 * squares));
-    for (int i = 0; i < mesh.getNumberOfControlPoints(); ++i) {
+    for (int i = 0; i < mesh.getNumberOfControlPoints(); ++i)
         mesh.setControlPoint(i, static_cast<float>(i / 2), static_cast<float>(i % 2), 0.0f);
-    }
     for (int square = 0; square < squares; ++square) {
         mesh.setPolygonVertexSize(square, 4);
         for (int corner = 0; corner < 4; ++corner) {

@@ -64,9 +64,8 @@ public:
 
     std::vector<std::string> childNames() const {
         std::vector<std::string> names;
-        for (int i = 0; i < scene->GetRootNode()->GetChildCount(); ++i) {
+        for (int i = 0; i < scene->GetRootNode()->GetChildCount(); ++i)
             names.emplace_back(scene->GetRootNode()->GetChild(i)->GetName());
-        }
         return names;
     }
 
@@ -80,17 +79,15 @@ public:
 /// Ticks and value of every key, as the curve has them.
 inline std::vector<std::pair<fbxsdk::FbxLongLong, float>> keysOf(const fbxsdk::FbxAnimCurve* curve) {
     std::vector<std::pair<fbxsdk::FbxLongLong, float>> keys;
-    for (int i = 0; curve != nullptr && i < curve->KeyGetCount(); ++i) {
+    for (int i = 0; curve != nullptr && i < curve->KeyGetCount(); ++i)
         keys.emplace_back(curve->KeyGetTime(i).Get(), curve->KeyGetValue(i));
-    }
     return keys;
 }
 
 inline std::vector<float> valuesOf(const fbxsdk::FbxAnimCurve* curve) {
     std::vector<float> values;
-    for (const auto& key : keysOf(curve)) {
+    for (const auto& key : keysOf(curve))
         values.push_back(key.second);
-    }
     return values;
 }
 
@@ -119,9 +116,8 @@ inline std::unique_ptr<TnFbxMesh> movingMesh(const std::string& name, int sets) 
     auto mesh = polygonMesh(name);
     for (int set = 1; set < sets; ++set) {
         mesh->addControlPointSet();
-        for (int i = 0; i < mesh->getNumberOfControlPoints(); ++i) {
+        for (int i = 0; i < mesh->getNumberOfControlPoints(); ++i)
             mesh->addControlPoint(static_cast<float>(i), static_cast<float>(i * i), static_cast<float>(set));
-        }
     }
     return mesh;
 }

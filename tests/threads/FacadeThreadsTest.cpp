@@ -35,12 +35,10 @@ constexpr int kRounds = 5;
 template <class Work>
 void onAllThreads(const Work& work) {
     std::vector<std::thread> threads;
-    for (int i = 0; i < kThreads; ++i) {
+    for (int i = 0; i < kThreads; ++i)
         threads.emplace_back([&work, i] { work(i); });
-    }
-    for (std::thread& thread : threads) {
+    for (std::thread& thread : threads)
         thread.join();
-    }
 }
 
 std::string dataFile(const char* name) { return std::string(TARNELL_TEST_DATA "/sdk/") + name; }
@@ -72,9 +70,8 @@ TEST(FacadeThreads, WriteFilesOfTheirOwnAtTheSameTime) {
         info.setFPS(thread == 0 ? 24.0f : 60.0f); // rates are set per thread
         info.setStartFrame(1);
         info.setEndFrame(2);
-        for (int round = 0; round < kRounds; ++round) {
+        for (int round = 0; round < kRounds; ++round)
             EXPECT_TRUE(Fbx().writeFile(info, {}, {}, {}, {&null}, {mesh.get()})) << lastError();
-        }
     });
 
     for (int i = 0; i < kThreads; ++i) {
@@ -109,13 +106,11 @@ std::string meshesOf(const std::string& fileName, EFbxFidelity fidelity = kFbxFi
     const bool read = Fbx().getMeshes(info, &meshes, count);
     const std::unique_ptr<TnFbxMesh[]> owner(meshes);
     std::string answer = (read ? "read " : "failed ") + lastError();
-    for (const std::string& warning : lastWarnings()) {
+    for (const std::string& warning : lastWarnings())
         answer += "; " + warning;
-    }
     const auto add = [&answer](auto... numbers) {
-        for (const float number : {static_cast<float>(numbers)...}) {
+        for (const float number : {static_cast<float>(numbers)...})
             answer.append(static_cast<const char*>(static_cast<const void*>(&number)), sizeof(number));
-        }
     };
     for (int i = 0; meshes != nullptr && i < count; ++i) {
         const TnFbxMesh& mesh = meshes[i];
@@ -167,9 +162,8 @@ TEST_P(FacadeReads, GiveTheSameAtTheSameTime) {
     const std::string alone = meshesOf(mFile);
     setMaximumThreads(3);
     onAllThreads([&](int) {
-        for (int round = 0; round < 2; ++round) {
+        for (int round = 0; round < 2; ++round)
             EXPECT_TRUE(meshesOf(mFile) == alone);
-        }
     });
 }
 

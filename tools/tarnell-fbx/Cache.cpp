@@ -228,11 +228,10 @@ void printEntries(const std::vector<CacheEntry>& entries, const CacheOptions& op
             printUse(*entry.use, entry.path, out, page.terminal());
         if (entry.path.empty())
             continue;
-        if (shown.insert(entry.path).second) {
+        if (shown.insert(entry.path).second)
             printContent(entry.facts, options, out, page.terminal());
-        } else {
+        else
             out << "  Content as above\n";
-        }
     }
 }
 
@@ -326,11 +325,10 @@ void printContent(const CacheFacts& facts, bool withSamples, JsonWriter& json) {
     json.boolean("oneFile", facts.oneFile);
     json.integer("chunkBits", isMax(facts) ? 0 : facts.wide ? 64 : 32);
     json.key("frameRate");
-    if (facts.frameRate > 0.0) {
+    if (facts.frameRate > 0.0)
         json.real(facts.frameRate);
-    } else {
+    else
         json.null();
-    }
     json.real("framesPerSample", facts.framesPerSample);
     json.real("start", facts.start);
     json.real("end", facts.end);
@@ -352,11 +350,10 @@ void printJson(const std::vector<CacheEntry>& entries, const CacheOptions& optio
         json.boolean("sound", entry.isSound());
         printUse(entry.use, json);
         json.key("content");
-        if (entry.path.empty()) {
+        if (entry.path.empty())
             json.null();
-        } else {
+        else
             printContent(entry.facts, options.samples, json);
-        }
         json.endObject();
     }
     json.endArray();
@@ -365,27 +362,30 @@ void printJson(const std::vector<CacheEntry>& entries, const CacheOptions& optio
 } // namespace
 
 int cache(const CacheOptions& options) {
-    return showFiles(options, "cache", [&options](Page& page) -> int {
-        const std::vector<CacheEntry> entries = isCacheFile(page.file())
-                                                    ? entriesOfCacheFile(page.file(), options.verify)
-                                                    : entriesOfScene(page.file(), options.verify);
-        if (page.isJson()) {
-            page.json("cache", [&](JsonWriter& json) { printJson(entries, options, json); });
-        } else {
-            std::ostream& out = page.begin();
-            out << page.terminal().paint(Ink::heading, spoken(page.file())) << '\n';
-            printEntries(entries, options, page, out);
-            if (entries.empty())
-                out << "  no mesh has a point cache\n";
-        }
-        const auto faulty =
-            std::count_if(entries.begin(), entries.end(), [](const CacheEntry& each) { return !each.isSound(); });
-        if (!options.verify || faulty == 0)
-            return kSuccess;
-        printError(page.file(),
-                   std::to_string(faulty) + " of " + std::to_string(entries.size()) + " caches have faults");
-        return kUnreadable;
-    });
+    return showFiles(
+        options, "cache",
+        [&options](Page& page) -> int {
+            const std::vector<CacheEntry> entries = isCacheFile(page.file())
+                                                        ? entriesOfCacheFile(page.file(), options.verify)
+                                                        : entriesOfScene(page.file(), options.verify);
+            if (page.isJson()) {
+                page.json(
+                    "cache", [&](JsonWriter& json) { printJson(entries, options, json); });
+            } else {
+                std::ostream& out = page.begin();
+                out << page.terminal().paint(Ink::heading, spoken(page.file())) << '\n';
+                printEntries(entries, options, page, out);
+                if (entries.empty())
+                    out << "  no mesh has a point cache\n";
+            }
+            const auto faulty = std::count_if(
+                entries.begin(), entries.end(), [](const CacheEntry& each) { return !each.isSound(); });
+            if (!options.verify || faulty == 0)
+                return kSuccess;
+            printError(page.file(),
+                       std::to_string(faulty) + " of " + std::to_string(entries.size()) + " caches have faults");
+            return kUnreadable;
+        });
 }
 
 } // namespace tool

@@ -47,7 +47,8 @@ std::string channelList(FbxCache& cache) {
 }
 
 bool allFinite(const std::vector<double>& numbers) {
-    return std::all_of(numbers.begin(), numbers.end(), [](double number) { return std::isfinite(number); });
+    return std::all_of(
+        numbers.begin(), numbers.end(), [](double number) { return std::isfinite(number); });
 }
 
 std::string atFrame(std::int64_t frame, const std::string& fault) {

@@ -89,11 +89,10 @@ void printTitle(const CameraFacts& camera, std::ostream& out, const Terminal& te
 }
 
 void printLens(const CameraFacts& camera, const CameraMoment& moment, Lines& lines) {
-    if (camera.orthographic) {
+    if (camera.orthographic)
         lines.line("Ortho width", rounded(camera.ortho->width, 4) + " cm");
-    } else {
+    else
         lines.line("Focal length", significant(moment.focalLength, 6) + " mm");
-    }
     lines.line("Film back", filmBackText(camera, moment));
     if (!camera.orthographic)
         lines.line("FOV of film", degrees(moment.fovX, moment.fovY));
@@ -267,11 +266,10 @@ void printMoment(const CameraMoment& moment, JsonWriter& json) {
 
 void textOrNull(JsonWriter& json, std::string_view key, const std::string& text, bool isThere) {
     json.key(key);
-    if (isThere) {
+    if (isThere)
         json.text(text);
-    } else {
+    else
         json.null();
-    }
 }
 
 const char* driverKey(LensDriver driver) {
@@ -439,13 +437,12 @@ int camera(const CameraOptions& options) {
         CameraList list = camerasOf(page.file(), opened, options.take);
         keepNamed(list, options.name);
         const Range range = rangeOf(list, options);
-        if (page.isJson()) {
+        if (page.isJson())
             page.json("camera", [&](JsonWriter& json) { printJson(list, options, range, opened.hasIds(), json); });
-        } else if (page.form() == Form::csv) {
+        else if (page.form() == Form::csv)
             printCsv(list, range, page);
-        } else {
+        else
             printText(list, options, range, page);
-        }
         return kSuccess;
     });
 }

@@ -26,10 +26,9 @@ namespace {
 /// The nodes that a faithful read has as cameras, in its order.
 std::vector<FbxNode*> cameraNodes(FbxScene& scene) {
     std::vector<FbxNode*> nodes;
-    for (const TreeNode& each : nodesInOrder(scene)) {
+    for (const TreeNode& each : nodesInOrder(scene))
         if (!each.isDetached && each.node->GetCamera() && !isProducer(*each.node))
             nodes.push_back(each.node);
-    }
     return nodes;
 }
 
@@ -39,14 +38,14 @@ Vector3 unitVector(const FbxVector4& vector) {
 }
 
 bool anyAnimated(const TnFbxCamera& camera, std::initializer_list<TnFbxCamera::EFbxCameraChannelType> channels) {
-    return std::any_of(channels.begin(), channels.end(), [&](auto channel) { return camera.getAnimated(channel); });
+    return std::any_of(
+        channels.begin(), channels.end(), [&](auto channel) { return camera.getAnimated(channel); });
 }
 
 bool anyMoves(const TnFbxCamera& camera) {
-    for (int i = TnFbxCamera::kFbxTransformPositionX; i <= TnFbxCamera::kFbxTransformRotationZ; ++i) {
+    for (int i = TnFbxCamera::kFbxTransformPositionX; i <= TnFbxCamera::kFbxTransformRotationZ; ++i)
         if (camera.getTransformAnimated(static_cast<TnFbxCamera::EFbxTransformChannelType>(i)))
             return true;
-    }
     return false;
 }
 

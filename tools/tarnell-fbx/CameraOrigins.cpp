@@ -95,13 +95,11 @@ private:
         const std::string reason = std::string("the lens is driven by ") + driverText(mFacts.driver);
         const FbxProperty all[] = {mCamera.FieldOfView, mCamera.FieldOfViewX, mCamera.FieldOfViewY,
                                    mCamera.FocalLength};
-        for (const FbxProperty& property : all) {
-            if (mFacts.orthographic) {
+        for (const FbxProperty& property : all)
+            if (mFacts.orthographic)
                 add(property, "orthographic cameras have no lens");
-            } else if (!drivesLens(mFacts, property)) {
+            else if (!drivesLens(mFacts, property))
                 add(property, reason);
-            }
-        }
     }
 
     void addFilm() {
@@ -125,21 +123,19 @@ private:
     }
 
     void addAim() {
-        if (!mFacts.hasTarget) {
+        if (!mFacts.hasTarget)
             addUnless(0.0, "Roll", "the node rotates the camera; Roll applies to cameras with a target");
-        } else if (mFacts.node->LclRotation.Get() != FbxDouble3(0.0, 0.0, 0.0)) {
+        else if (mFacts.node->LclRotation.Get() != FbxDouble3(0.0, 0.0, 0.0))
             add(mFacts.node->LclRotation, "the target determines the rotation of the camera");
-        }
     }
 
     void addTurns() {
         if (mFacts.rotationActive)
             return;
         for (const auto& [name, turn] :
-             {std::pair("PreRotation", &mFacts.preRotation), std::pair("PostRotation", &mFacts.postRotation)}) {
+             {std::pair("PreRotation", &mFacts.preRotation), std::pair("PostRotation", &mFacts.postRotation)})
             if (!isZero(*turn))
                 mValues.push_back({name, vectorText(*turn, 6), "RotationActive is off", vectorText(*turn, 3)});
-        }
     }
 
     const CameraFacts& mFacts;
@@ -332,10 +328,9 @@ std::string restDirection(const CameraFacts& facts) {
     if (facts.rotationActive)
         looks = turnOf(facts.preRotation).MultT(turnOf(facts.postRotation).Inverse().MultT(looks));
     constexpr double kTolerance = 1e-6;
-    for (int axis = 0; axis < 3; ++axis) {
+    for (int axis = 0; axis < 3; ++axis)
         if (std::abs(std::abs(looks[axis]) - 1.0) < kTolerance)
             return std::string(looks[axis] < 0.0 ? "−" : "+") + "XYZ"[axis];
-    }
     return vectorText({looks[0], looks[1], looks[2]}, 3);
 }
 
@@ -361,11 +356,10 @@ std::string rounded(double number, int decimals) {
 std::string significant(double number, int digits) {
     char text[64];
     constexpr double kUsual = 1e15;
-    if (std::abs(number) >= std::pow(10.0, digits) && std::abs(number) < kUsual) {
+    if (std::abs(number) >= std::pow(10.0, digits) && std::abs(number) < kUsual)
         std::snprintf(text, sizeof text, "%.0f", number); // not 2e+05
-    } else {
+    else
         std::snprintf(text, sizeof text, "%.*g", digits, number);
-    }
     return withMinus(text);
 }
 

@@ -105,10 +105,9 @@ private:
 
     /// Records the call's warnings.
     bool done(bool result) {
-        for (const std::string& warning : lastWarnings()) {
+        for (const std::string& warning : lastWarnings())
             if (mKnownWarnings.insert(warning).second)
                 mWarnings.push_back(warning);
-        }
         return result;
     }
 
@@ -155,10 +154,9 @@ private:
     }
 
     static bool moves(const TnFbxMesh& mesh) {
-        for (int i = 0; i <= TnFbxTransform::kFbxTransformSkewZ; ++i) {
+        for (int i = 0; i <= TnFbxTransform::kFbxTransformSkewZ; ++i)
             if (mesh.getTransformAnimated(static_cast<TnFbxTransform::EFbxTransformChannelType>(i)))
                 return true;
-        }
         return false;
     }
 
@@ -168,10 +166,9 @@ private:
         for (long long frame = firstFrame() + 1; frame <= last; ++frame) {
             mProgress.say("reading meshes, frame " + std::to_string(frame) + " of " + std::to_string(last));
             mReader.setFrame(static_cast<float>(frame));
-            for (const auto& [node, mesh] : mMoving) {
+            for (const auto& [node, mesh] : mMoving)
                 if (!done(mReader.readPoints(*node, *mesh)))
                     return false;
-            }
         }
         return true;
     }

@@ -208,10 +208,9 @@ void Losses::add(int count, const std::string& what) {
 
 void Losses::addScene(FbxScene& scene) {
     NodeCounts nodes(scene, *this);
-    for (const TreeNode& entry : nodesInOrder(scene)) {
+    for (const TreeNode& entry : nodesInOrder(scene))
         if (entry.node->GetParent() && !isProducer(*entry.node) && !isSkewHelper(*entry.node))
             nodes.add(*entry.node);
-    }
     add(nodes.parents, "written below the root with their world transforms: objects with a parent");
     add(nodes.shared, "written as a copy for each node: cameras, lights and nulls that several nodes share");
     if (wants("meshes")) {
@@ -245,10 +244,9 @@ namespace {
 
 /// Whether an object of the file, a geometry or in older files a model, is to be subdivided.
 bool isSubdivided(const extensions::FileRecord& object) {
-    for (auto child = object.firstChild(); child; child = child.nextSibling()) {
+    for (auto child = object.firstChild(); child; child = child.nextSibling())
         if (child.name() == "Smoothness" && child.value(0).integer > 0)
             return true;
-    }
     return false;
 }
 

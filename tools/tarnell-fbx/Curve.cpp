@@ -94,10 +94,9 @@ private:
         mFound = true;
         for (FbxObject* part : withAttributes(object)) {
             for (const FbxProperty& property : propertiesOf(*part)) {
-                for (const Channel& channel : channelsOf(property, mTake)) {
+                for (const Channel& channel : channelsOf(property, mTake))
                     if (!channel.curves.empty())
                         add(*part, {channel}, "");
-                }
             }
         }
     }
@@ -353,11 +352,10 @@ void printExtrapolation(const char* key, const Extrapolation& extrapolation, Jso
     json.beginObject();
     json.text("type", extrapolation.type);
     json.key("count");
-    if (extrapolation.count) {
+    if (extrapolation.count)
         json.integer(*extrapolation.count);
-    } else {
+    else
         json.null();
-    }
     json.endObject();
 }
 
@@ -442,34 +440,36 @@ void printJson(const Curves& curves, JsonWriter& json) {
 } // namespace
 
 int curve(const CurveOptions& options) {
-    return showFiles(options, "curve", [&options](Page& page) -> int {
-        const SceneFile opened(page.file());
-        FbxAnimStack* take = opened.chooseTake(options.take);
-        Target target(opened.scene(), options.target, take);
-        Curves curves{opened, take, target.channels(), {}};
-        if (options.frames) {
-            curves.range = FrameRange{options.frames->first, options.frames->second};
-        } else if (options.form == Form::csv || options.form == Form::plot) {
-            curves.range = defaultRange(opened, take, curves.channels);
-        }
-        switch (options.form) {
-        case Form::json:
-        case Form::jsonLines:
-            page.json("curve", [&](JsonWriter& json) { printJson(curves, json); });
-            break;
-        case Form::csv:
-            printCsv(curves, page);
-            break;
-        case Form::plot:
-            plot(curves, page);
-            break;
-        case Form::text:
-        case Form::html: // not offered here
-            printText(curves, page);
-            break;
-        }
-        return kSuccess;
-    });
+    return showFiles(
+        options, "curve",
+        [&options](Page& page) -> int {
+            const SceneFile opened(page.file());
+            FbxAnimStack* take = opened.chooseTake(options.take);
+            Target target(opened.scene(), options.target, take);
+            Curves curves{opened, take, target.channels(), {}};
+            if (options.frames)
+                curves.range = FrameRange{options.frames->first, options.frames->second};
+            else if (options.form == Form::csv || options.form == Form::plot)
+                curves.range = defaultRange(opened, take, curves.channels);
+            switch (options.form) {
+            case Form::json:
+            case Form::jsonLines:
+                page.json(
+                    "curve", [&](JsonWriter& json) { printJson(curves, json); });
+                break;
+            case Form::csv:
+                printCsv(curves, page);
+                break;
+            case Form::plot:
+                plot(curves, page);
+                break;
+            case Form::text:
+            case Form::html: // not offered here
+                printText(curves, page);
+                break;
+            }
+            return kSuccess;
+        });
 }
 
 } // namespace tool

@@ -160,11 +160,10 @@ void printShape(const KeyFacts& key, JsonWriter& json) {
     json.boolean("timeIndependent", key.timeIndependent);
     const auto add = [&](const char* name, const auto& number) {
         json.key(name);
-        if (number) {
+        if (number)
             json.real(*number);
-        } else {
+        else
             json.null();
-        }
     };
     add("leftSlope", key.leftSlope);
     add("rightSlope", key.rightSlope);

@@ -65,8 +65,8 @@ std::vector<PlacedNode> placedNodes(const FbxProperty& property, const TakeLayer
         }
     }
     const auto key = [](const PlacedNode& each) { return std::pair(each.place.take, each.place.layer); };
-    std::stable_sort(nodes.begin(), nodes.end(),
-                     [&](const PlacedNode& a, const PlacedNode& b) { return key(a) < key(b); });
+    std::stable_sort(
+        nodes.begin(), nodes.end(), [&](const PlacedNode& a, const PlacedNode& b) { return key(a) < key(b); });
     const auto isSame = [&](const PlacedNode& a, const PlacedNode& b) { return key(a) == key(b); };
     nodes.erase(std::unique(nodes.begin(), nodes.end(), isSame), nodes.end());
     return nodes;
@@ -88,10 +88,9 @@ std::vector<Channel> channelsOf(const FbxProperty& property, FbxAnimStack* take)
 }
 
 TakeLayers::TakeLayers(const std::vector<FbxAnimStack*>& takes) {
-    for (std::size_t take = 0; take < takes.size(); ++take) {
+    for (std::size_t take = 0; take < takes.size(); ++take)
         for (int i = 0; i < takes[take]->GetMemberCount<FbxAnimLayer>(); ++i)
             mPlaces[takes[take]->GetMember<FbxAnimLayer>(i)].push_back({take, i});
-    }
 }
 
 const std::vector<TakeLayers::Place>& TakeLayers::placesOf(const FbxAnimLayer& layer) const {
@@ -110,20 +109,18 @@ std::vector<TakeChannel> keyedChannels(const FbxProperty& property, const TakeLa
         std::vector<Channel> channels = stillChannels(property);
         for (; node != nodes.end() && node->place.take == take; ++node)
             addCurves(*node->node, node->layer, channels);
-        for (Channel& channel : channels) {
+        for (Channel& channel : channels)
             if (!channel.curves.empty())
                 keyed.push_back({take, std::move(channel)});
-        }
     }
     return keyed;
 }
 
 int keyCount(const FbxProperty& property, FbxAnimStack* take) {
     int keys = 0;
-    for (const Channel& channel : channelsOf(property, take)) {
+    for (const Channel& channel : channelsOf(property, take))
         for (const LayerCurve& each : channel.curves)
             keys += each.curve->KeyGetCount();
-    }
     return keys;
 }
 

@@ -34,11 +34,10 @@ std::vector<Difference> withoutRepetition(const std::vector<Difference>& found) 
         const bool isSame = last && each.kind == DiffKind::curve && last->kind == each.kind &&
                             last->object == each.object && last->a == each.a && last->b == each.b && !each.amount &&
                             !last->amount;
-        if (isSame) {
+        if (isSame)
             last->what += ", " + each.what;
-        } else {
+        else
             lines.push_back(each);
-        }
     }
     return lines;
 }
@@ -65,20 +64,18 @@ void printText(const DiffPage& page, std::ostream& out) {
 
 void textOrNull(JsonWriter& json, std::string_view key, const std::string& text) {
     json.key(key);
-    if (text.empty()) {
+    if (text.empty())
         json.null();
-    } else {
+    else
         json.text(text);
-    }
 }
 
 void numberOrNull(JsonWriter& json, std::string_view key, const std::optional<double>& number) {
     json.key(key);
-    if (number) {
+    if (number)
         json.real(*number);
-    } else {
+    else
         json.null();
-    }
 }
 
 void printDifference(const Difference& difference, JsonWriter& json) {
@@ -140,13 +137,12 @@ int fail(const DiffOptions& options, const std::string& reason) {
 }
 
 void print(const DiffPage& page, Form form) {
-    if (form == Form::json || form == Form::jsonLines) {
+    if (form == Form::json || form == Form::jsonLines)
         printJson(page, form, std::cout);
-    } else if (form == Form::html) {
+    else if (form == Form::html)
         writeDiffPage(page, std::cout);
-    } else {
+    else
         printText(page, std::cout);
-    }
 }
 
 } // namespace

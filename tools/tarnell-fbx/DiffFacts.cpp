@@ -26,10 +26,9 @@ template <class Object, class Kept>
 void assign(const std::vector<FbxNode*>& nodes, const FaithfulObjects<Object>& read,
             std::unordered_map<const FbxNode*, Kept>& objects) {
     std::size_t next = 0;
-    for (FbxNode* node : nodes) {
+    for (FbxNode* node : nodes)
         if (next < read.count && read.objects.get()[next].getName() == node->GetName())
             objects[node] = read.objects.get() + next++;
-    }
     if (next != read.count)
         throw Unreadable("the file was changed while it was read");
 }
@@ -234,10 +233,9 @@ void compareFiles(Comparison& comparison) {
 void compareTrees(Comparison& comparison) {
     std::unordered_map<const FbxNode*, const FbxNode*> counterparts;
     counterparts[comparison.a.file.opened.scene().GetRootNode()] = comparison.b.file.opened.scene().GetRootNode();
-    for (const NodePair& pair : comparison.pairs) {
+    for (const NodePair& pair : comparison.pairs)
         if (pair.a)
             counterparts[pair.a] = pair.b;
-    }
     for (const auto& [a, b] : comparison.pairs) {
         if (!a) {
             comparison.add(DiffKind::added, b->GetName(), kindOf(*b), "", placeInTree(*b));
@@ -299,10 +297,9 @@ void compareCurves(Comparison& comparison) {
             if (sameSpace || name.rfind("Lcl ", 0) != 0)
                 curves.compare(name, keys, found == b.end() ? none : found->second);
         }
-        for (const auto& [name, keys] : b) {
+        for (const auto& [name, keys] : b)
             if (!a.count(name) && (sameSpace || name.rfind("Lcl ", 0) != 0))
                 curves.compare(name, none, keys);
-        }
     };
     for (const auto& [nodeA, nodeB] : comparison.pairs)
         comparePair(nodeA, nodeB);

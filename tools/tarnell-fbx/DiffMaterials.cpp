@@ -149,26 +149,23 @@ public:
     using ByProperty = std::map<std::string, Textures>;
 
     explicit TextureTable(FbxScene& scene) {
-        for (FbxNode* node : nodesOfTree(scene)) {
+        for (FbxNode* node : nodesOfTree(scene))
             if (FbxMesh* mesh = node->GetMesh())
                 addLayers(*node, *mesh);
-        }
     }
 
     /// Of a material, or of a node without one.
     [[nodiscard]] ByProperty of(const FbxObject& owner) const {
         ByProperty textures;
-        for (const FbxProperty& property : propertiesOf(owner)) {
+        for (const FbxProperty& property : propertiesOf(owner))
             for (int i = 0; i < property.GetSrcObjectCount<FbxTexture>(); ++i)
                 addFlat(*property.GetSrcObject<FbxTexture>(i), textures[property.GetHierarchicalName().Buffer()]);
-        }
         const auto found = mOfPolygons.find(&owner);
         if (found == mOfPolygons.end())
             return textures;
-        for (const auto& [property, ofPolygons] : found->second) {
+        for (const auto& [property, ofPolygons] : found->second)
             for (FbxTexture* texture : ofPolygons)
                 addOnce(texture, textures[property]);
-        }
         return textures;
     }
 
@@ -212,10 +209,9 @@ private:
             return;
         const PolygonMaterials materials(node);
         for (int i = 0; i < mesh.GetLayerCount(); ++i) {
-            for (const auto& channel : kChannels) {
+            for (const auto& channel : kChannels)
                 if (const FbxLayerElementTexture* element = mesh.GetLayer(i)->GetTextures(channel.type))
                     addElement(node, materials, *element, channel.property);
-            }
         }
     }
 
@@ -295,16 +291,14 @@ void compareProperties(Comparison& comparison, const FbxSurfaceMaterial& a, cons
     const PropertiesByName ofA = propertiesByName(a), ofB = propertiesByName(b);
     for (const FbxProperty& property : propertiesOf(a)) {
         const auto found = ofB.find(property.GetHierarchicalName().Buffer());
-        if (found != ofB.end() && (sameClass || found->first != "ShadingModel")) {
+        if (found != ofB.end() && (sameClass || found->first != "ShadingModel"))
             properties.compare(property, found->second);
-        } else if (sameClass) {
+        else if (sameClass)
             properties.alone(property, /*isA=*/true);
-        }
     }
-    for (const FbxProperty& property : propertiesOf(b)) {
+    for (const FbxProperty& property : propertiesOf(b))
         if (sameClass && !ofA.contains(property.GetHierarchicalName().Buffer()))
             properties.alone(property, /*isA=*/false);
-    }
 }
 
 std::string holdersText(const FbxSurfaceMaterial& material) {
@@ -331,10 +325,9 @@ std::string materialsText(const FbxNode& node) {
 class AssignmentComparison {
 public:
     explicit AssignmentComparison(Comparison& comparison) : mComparison(comparison) {
-        for (const MaterialPair& pair : comparison.materials) {
+        for (const MaterialPair& pair : comparison.materials)
             if (pair.a)
                 mCounterpart[pair.a] = pair.b;
-        }
     }
 
     void compare(FbxNode& a, FbxNode& b) {
@@ -344,10 +337,9 @@ public:
         if (a.GetMaterialCount() < 2 || one.count() != other.count())
             return;
         int differing = 0, first = 0;
-        for (int i = 0; i < one.count(); ++i) {
+        for (int i = 0; i < one.count(); ++i)
             if (counterpartOf(one.of(i)) != other.of(i))
                 first = differing++ == 0 ? i : first;
-        }
         if (differing > 0)
             mComparison.add(DiffKind::material, a.GetName(),
                             std::to_string(differing) + " of " + std::to_string(one.count()) +

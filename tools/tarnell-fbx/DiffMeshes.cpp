@@ -35,10 +35,9 @@ FaithfulObjects<TnFbxMesh> meshesAt(const DiffSide& side, double frame, MeshOf& 
     info.setTransformPoints(false);
     auto read = readFaithfully<TnFbxMesh>(info, &Tarnell::Fbx::Fbx::getMeshes);
     std::size_t next = 0;
-    for (FbxNode* node : nodesOfTree(side.file.opened.scene())) {
+    for (FbxNode* node : nodesOfTree(side.file.opened.scene()))
         if (next < read.count && mayBeMesh(*node) && read.objects.get()[next].getName() == node->GetName())
             meshOf[node] = read.objects.get() + next++;
-    }
     return read;
 }
 

@@ -20,10 +20,9 @@ namespace {
 constexpr double kDegrees = 57.29577951308232;
 
 bool changes(const TnFbxTransform& object) {
-    for (int i = TnFbxTransform::kFbxTransformPositionX; i <= TnFbxTransform::kFbxTransformSkewZ; ++i) {
+    for (int i = TnFbxTransform::kFbxTransformPositionX; i <= TnFbxTransform::kFbxTransformSkewZ; ++i)
         if (object.getTransformAnimated(static_cast<TnFbxTransform::EFbxTransformChannelType>(i)))
             return true;
-    }
     return false;
 }
 
@@ -45,10 +44,9 @@ public:
     explicit TransformComparison(Comparison& comparison) : mComparison(comparison) {}
 
     void run() {
-        for (const NodePair& pair : mComparison.pairs) {
+        for (const NodePair& pair : mComparison.pairs)
             if (pair.a && pair.b)
                 compare(pair);
-        }
     }
 
 private:
@@ -165,10 +163,9 @@ private:
             FbxAMatrix fromA = above.a;
             const FbxAMatrix expected = above.b * fromA.Inverse() * own.a;
             const double size = std::max({1.0, lengthOf(own.b.GetT()), lengthOf(above.b.GetT())});
-            for (int row = 0; row < 4; ++row) {
+            for (int row = 0; row < 4; ++row)
                 if (!(distance(expected.GetRow(row), own.b.GetRow(row)) <= mComparison.settings.tolerance * size))
                     return false;
-            }
         }
         return true;
     }

@@ -107,13 +107,18 @@ public:
     void details(TnFbxTransform&) {}
     void details(TnFbxMesh& mesh) {
         const int corners = mesh.getNumberOfPolygonVertices();
-        integers("polygonVertexSizes", mesh.getNumberOfPolygons(), [&](int i) { return mesh.getPolygonVertexSize(i); });
-        integers("pointIndices", corners, [&](int i) { return mesh.getPointIndex(i); });
-        reals("controlPoints", true, mesh.getNumberOfControlPoints(), 3,
-              [&](int i, float* v) { mesh.getControlPoint(i, v[0], v[1], v[2]); });
-        reals("normals", mesh.getValidNormals(), corners, 3,
-              [&](int i, float* v) { mesh.getNormal(i, v[0], v[1], v[2]); });
-        reals("uvs", mesh.getValidUVs(), corners, 2, [&](int i, float* v) { mesh.getUV(i, v[0], v[1]); });
+        integers(
+            "polygonVertexSizes", mesh.getNumberOfPolygons(), [&](int i) { return mesh.getPolygonVertexSize(i); });
+        integers(
+            "pointIndices", corners, [&](int i) { return mesh.getPointIndex(i); });
+        reals(
+            "controlPoints", true, mesh.getNumberOfControlPoints(), 3,
+            [&](int i, float* v) { mesh.getControlPoint(i, v[0], v[1], v[2]); });
+        reals(
+            "normals", mesh.getValidNormals(), corners, 3,
+            [&](int i, float* v) { mesh.getNormal(i, v[0], v[1], v[2]); });
+        reals(
+            "uvs", mesh.getValidUVs(), corners, 2, [&](int i, float* v) { mesh.getUV(i, v[0], v[1]); });
         reals("colours", mesh.getValidColours(), corners, 4,
               [&](int i, float* v) { mesh.getColour(i, v[0], v[1], v[2], v[3]); });
     }
@@ -239,10 +244,9 @@ public:
         printStacks();
         printRange();
         bool complete = true;
-        for (const Kind& kind : kinds()) {
+        for (const Kind& kind : kinds())
             if (wanted(kind.name))
                 complete = kind.print(*this, kind) && complete;
-        }
         mJson.endObject();
         return complete;
     }

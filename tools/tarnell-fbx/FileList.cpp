@@ -26,11 +26,10 @@ FileList expandFiles(const std::vector<std::string>& names) {
             continue;
         }
         glob_t found{};
-        if (glob(name.c_str(), 0, nullptr, &found) == 0) {
+        if (glob(name.c_str(), 0, nullptr, &found) == 0)
             list.files.insert(list.files.end(), found.gl_pathv, found.gl_pathv + found.gl_pathc);
-        } else {
+        else
             list.unmatched.push_back(name);
-        }
         globfree(&found);
     }
     return list;

@@ -241,11 +241,10 @@ void printJson(const Facts& facts, JsonWriter& json) {
     json.integer("version", facts.version);
     json.text("encoding", facts.ascii ? "ascii" : "binary");
     json.key("bytes");
-    if (facts.bytes) {
+    if (facts.bytes)
         json.integer(static_cast<long long>(*facts.bytes));
-    } else {
+    else
         json.null();
-    }
     json.text("creator", facts.creator);
     printSettings(facts, json);
     printStacks(facts.stacks, json);
@@ -277,16 +276,18 @@ void printInfo(const std::string& file, const SceneFile& opened, JsonWriter& jso
 }
 
 int info(const LookOptions& options) {
-    return showFiles(options, "info", [](Page& page) -> int {
-        const SceneFile opened(page.file());
-        const Facts facts = factsOf(page.file(), opened);
-        if (page.isJson()) {
-            page.json("info", [&](JsonWriter& json) { printJson(facts, json); });
-        } else {
-            printText(facts, *opened.scene().GetRootNode(), page);
-        }
-        return kSuccess;
-    });
+    return showFiles(
+        options, "info",
+        [](Page& page) -> int {
+            const SceneFile opened(page.file());
+            const Facts facts = factsOf(page.file(), opened);
+            if (page.isJson())
+                page.json(
+                    "info", [&](JsonWriter& json) { printJson(facts, json); });
+            else
+                printText(facts, *opened.scene().GetRootNode(), page);
+            return kSuccess;
+        });
 }
 
 } // namespace tool

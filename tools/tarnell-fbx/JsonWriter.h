@@ -54,11 +54,10 @@ private:
     }
     template <class Real>
     void finite(Real value) {
-        if (std::isfinite(value)) {
+        if (std::isfinite(value))
             number(value);
-        } else {
+        else
             null();
-        }
     }
     template <class Number>
     void number(Number value) {

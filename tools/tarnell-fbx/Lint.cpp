@@ -91,11 +91,10 @@ void printJson(const std::vector<Finding>& findings, JsonWriter& json) {
         json.beginObject();
         printRule(*finding.rule, json);
         json.key("object");
-        if (finding.object.empty()) {
+        if (finding.object.empty())
             json.null();
-        } else {
+        else
             json.text(finding.object);
-        }
         json.text("text", finding.text);
         json.key("takes");
         json.beginArray();
@@ -135,11 +134,10 @@ int lint(const LintOptions& options) {
     return showFiles(options, "lint", [&options](Page& page) -> int {
         const SceneFile opened(page.file());
         const LintFindings findings = lintFindings(page.file(), opened, options.rules);
-        if (page.isJson()) {
+        if (page.isJson())
             page.json("lint", [&](JsonWriter& json) { printJson(findings.all, json); });
-        } else {
+        else
             printText(findings, page);
-        }
         return statusOf(findings.all);
     });
 }

@@ -91,10 +91,9 @@ void filmFormatDisagrees(const LintContext& context, LintReport& report) {
 }
 
 void squeezedFilm(const LintContext& context, LintReport& report) {
-    for (const CameraFacts& camera : context.cameras->cameras) {
+    for (const CameraFacts& camera : context.cameras->cameras)
         if (camera.squeeze != 1.0)
             report.add(camera.name, "the squeeze ratio is " + rounded(camera.squeeze, 4));
-    }
 }
 
 void filmOffset(const LintContext& context, LintReport& report) {
@@ -158,10 +157,9 @@ void imageShiftNotRead(const LintContext& context, LintReport& report) {
     const std::string shifting[] = {"OpticalCenterX", "OpticalCenterY", "FilmTranslateX",
                                     "FilmTranslateY", "FilmRollValue",  "PreScale"};
     for (const CameraFacts& camera : context.cameras->cameras) {
-        for (const IdleValue& idle : camera.idle) {
+        for (const IdleValue& idle : camera.idle)
             if (std::find(std::begin(shifting), std::end(shifting), idle.property) != std::end(shifting))
                 report.add(camera.name, idle.property + " is " + idle.shortValue);
-        }
     }
 }
 

@@ -22,10 +22,9 @@ void addChannels(LintContext& context) {
     const TakeLayers layers(context.stacks);
     context.channelsByTake.resize(std::max<std::size_t>(context.stacks.size(), 1));
     for (const FbxObject* object : context.objects) {
-        for (const FbxProperty& property : propertiesOf(*object)) {
+        for (const FbxProperty& property : propertiesOf(*object))
             for (TakeChannel& keyed : keyedChannels(property, layers))
                 context.channelsByTake[keyed.take].push_back({object, std::move(keyed.channel)});
-        }
     }
 }
 
@@ -38,10 +37,9 @@ LintContext contextOf(const std::string& file, const SceneFile& opened) {
     }
     context.nodes = nodesInOrder(scene);
     context.objects = extensions::objectsOf(scene);
-    for (FbxObject* object : context.objects) {
+    for (FbxObject* object : context.objects)
         if (auto* mesh = FbxCast<FbxMesh>(object))
             context.meshes.push_back(mesh);
-    }
     addChannels(context);
     return context;
 }
@@ -156,10 +154,9 @@ public:
             const auto [known, isNew] = mPlaces.try_emplace(std::move(key), mFindings.size());
             if (isNew)
                 mFindings.push_back(std::move(finding));
-            for (const TakeFacts* take : takes) {
+            for (const TakeFacts* take : takes)
                 if (take->exists)
                     mFindings[known->second].takes.push_back(take->name);
-            }
         }
     }
     std::vector<Finding> take() { return std::move(mFindings); }
@@ -291,10 +288,9 @@ private:
 
     [[nodiscard]] std::vector<const TakeFacts*> takesAtRest(std::size_t node) const {
         std::vector<const TakeFacts*> takes;
-        for (std::size_t take = 0; take < mContext.takes.size(); ++take) {
+        for (std::size_t take = 0; take < mContext.takes.size(); ++take)
             if (!mMoved.isMoved(node, take))
                 takes.push_back(&mContext.takes[take]);
-        }
         return takes;
     }
 

@@ -77,22 +77,26 @@ bool readFacts(const UsedCache& used, extensions::CacheFacts& facts) {
 } // namespace
 
 void polygonsOutOfRange(const LintContext& context, LintReport& report) {
-    forEachObjectRecord(context.records(), [&report](const extensions::FileRecord& record) {
-        const extensions::FileRecord points = childOf(record, "Vertices");
-        const extensions::FileRecord corners = childOf(record, "PolygonVertexIndex");
-        if (!points || !corners)
-            return;
-        const auto count = static_cast<std::int64_t>(numberCount(points) / 3);
-        std::vector<std::int64_t> indices(numberCount(corners));
-        if (!corners.readNumbers(indices.data(), indices.size()))
-            return;
-        const auto bad = std::count_if(indices.begin(), indices.end(), [count](std::int64_t index) {
-            return (index < 0 ? -index - 1 : index) >= count; // the last corner of a polygon is negative
+    forEachObjectRecord(
+        context.records(),
+        [&report](const extensions::FileRecord& record) {
+            const extensions::FileRecord points = childOf(record, "Vertices");
+            const extensions::FileRecord corners = childOf(record, "PolygonVertexIndex");
+            if (!points || !corners)
+                return;
+            const auto count = static_cast<std::int64_t>(numberCount(points) / 3);
+            std::vector<std::int64_t> indices(numberCount(corners));
+            if (!corners.readNumbers(indices.data(), indices.size()))
+                return;
+            const auto bad = std::count_if(
+                indices.begin(), indices.end(),
+                [count](std::int64_t index) {
+                    return (index < 0 ? -index - 1 : index) >= count; // the last corner of a polygon is negative
+                });
+            if (bad > 0)
+                report.add(objectName(record), countOf(bad, "polygon vertex refers", "polygon vertices refer") +
+                                                   " to a point beyond the " + std::to_string(count) + " of the mesh");
         });
-        if (bad > 0)
-            report.add(objectName(record), countOf(bad, "polygon vertex refers", "polygon vertices refer") +
-                                               " to a point beyond the " + std::to_string(count) + " of the mesh");
-    });
 }
 
 void smallPolygons(const LintContext& context, LintReport& report) {
@@ -109,10 +113,9 @@ void smallPolygons(const LintContext& context, LintReport& report) {
 }
 
 void meshWithoutPolygons(const LintContext& context, LintReport& report) {
-    for (const FbxMesh* mesh : context.meshes) {
+    for (const FbxMesh* mesh : context.meshes)
         if (mesh->GetPolygonCount() == 0)
             report.add(nameOf(*mesh), countOf(mesh->GetControlPointsCount(), "point", "points") + " and no polygons");
-    }
 }
 
 void meshWithoutNormals(const LintContext& context, LintReport& report) {
@@ -126,65 +129,76 @@ void meshWithoutNormals(const LintContext& context, LintReport& report) {
 }
 
 void cacheMissing(const LintContext& context, LintReport& report) {
-    forEachCache(context, [&](const UsedCache& used) {
-        FbxString relative, absolute;
-        used.cache->GetCacheFileName(relative, absolute);
-        if (used.path.empty())
-            report.add(nameOf(*used.mesh), "there is no " + inQuotes(relative.Buffer()) + " next to the file" +
-                                               (absolute.IsEmpty() ? "" : ", and no " + inQuotes(absolute.Buffer())));
-    });
+    forEachCache(
+        context,
+        [&](const UsedCache& used) {
+            FbxString relative, absolute;
+            used.cache->GetCacheFileName(relative, absolute);
+            if (used.path.empty())
+                report.add(nameOf(*used.mesh),
+                           "there is no " + inQuotes(relative.Buffer()) + " next to the file" +
+                               (absolute.IsEmpty() ? "" : ", and no " + inQuotes(absolute.Buffer())));
+        });
 }
 
 void cacheForeignPath(const LintContext& context, LintReport& report) {
-    forEachCache(context, [&](const UsedCache& used) {
-        FbxString relative, absolute;
-        used.cache->GetCacheFileName(relative, absolute);
-        std::error_code ignored;
-        const std::string name = absolute.Buffer();
-        if (relative.IsEmpty()) {
-            report.add(nameOf(*used.mesh),
-                       "the only path of the cache is " + inQuotes(name) + ", which other machines may not have");
-        } else if (!used.path.empty() && !name.empty() && !std::filesystem::exists(name, ignored)) {
-            report.add(nameOf(*used.mesh),
-                       "there is no " + inQuotes(name) + "; " + inQuotes(relative.Buffer()) + " was found");
-        }
-    });
+    forEachCache(
+        context,
+        [&](const UsedCache& used) {
+            FbxString relative, absolute;
+            used.cache->GetCacheFileName(relative, absolute);
+            std::error_code ignored;
+            const std::string name = absolute.Buffer();
+            if (relative.IsEmpty())
+                report.add(nameOf(*used.mesh),
+                           "the only path of the cache is " + inQuotes(name) + ", which other machines may not have");
+            else if (!used.path.empty() && !name.empty() && !std::filesystem::exists(name, ignored))
+                report.add(nameOf(*used.mesh),
+                           "there is no " + inQuotes(name) + "; " + inQuotes(relative.Buffer()) + " was found");
+        });
 }
 
 void cacheUnusable(const LintContext& context, LintReport& report) {
-    forEachCache(context, [&](const UsedCache& used) {
-        const std::string fault = used.path.empty() ? "" : cacheFault(*used.mesh);
-        if (!fault.empty())
-            report.add(nameOf(*used.mesh), fault);
-    });
+    forEachCache(
+        context,
+        [&](const UsedCache& used) {
+            const std::string fault = used.path.empty() ? "" : cacheFault(*used.mesh);
+            if (!fault.empty())
+                report.add(nameOf(*used.mesh), fault);
+        });
 }
 
 void cacheRange(const LintContext& context, LintReport& report) {
-    forEachCache(context, [&](const UsedCache& used) {
-        extensions::CacheFacts facts;
-        if (!context.take.exists || !readFacts(used, facts))
-            return;
-        const double toFrames = facts.frameRate > 0.0 ? context.take.frameRate / facts.frameRate : 1.0;
-        const double first = facts.samples.front().frame * toFrames, last = facts.samples.back().frame * toFrames;
-        constexpr double kHalfAFrame = 0.5;
-        if (first > static_cast<double>(context.take.firstFrame) + kHalfAFrame ||
-            last < static_cast<double>(context.take.lastFrame) - kHalfAFrame)
-            report.add(nameOf(*used.mesh), "samples from frame " + rounded(first, 3) + " to " + rounded(last, 3) +
-                                               ", and the take goes from " + std::to_string(context.take.firstFrame) +
-                                               " to " + std::to_string(context.take.lastFrame));
-    });
+    forEachCache(
+        context,
+        [&](const UsedCache& used) {
+            extensions::CacheFacts facts;
+            if (!context.take.exists || !readFacts(used, facts))
+                return;
+            const double toFrames = facts.frameRate > 0.0 ? context.take.frameRate / facts.frameRate : 1.0;
+            const double first = facts.samples.front().frame * toFrames, last = facts.samples.back().frame * toFrames;
+            constexpr double kHalfAFrame = 0.5;
+            if (first > static_cast<double>(context.take.firstFrame) + kHalfAFrame ||
+                last < static_cast<double>(context.take.lastFrame) - kHalfAFrame)
+                report.add(nameOf(*used.mesh), "samples from frame " + rounded(first, 3) + " to " + rounded(last, 3) +
+                                                   ", and the take goes from " +
+                                                   std::to_string(context.take.firstFrame) + " to " +
+                                                   std::to_string(context.take.lastFrame));
+        });
 }
 
 void cacheRate(const LintContext& context, LintReport& report) {
-    forEachCache(context, [&](const UsedCache& used) {
-        extensions::CacheFacts facts;
-        // Times of Maya caches are whole parts of 1/6000 second.
-        constexpr double kTolerance = 0.02;
-        if (readFacts(used, facts) && facts.frameRate > 0.0 &&
-            std::abs(facts.frameRate - context.take.frameRate) > kTolerance)
-            report.add(nameOf(*used.mesh),
-                       rateText(facts.frameRate) + ", and the file has " + rateText(context.take.frameRate));
-    });
+    forEachCache(
+        context,
+        [&](const UsedCache& used) {
+            extensions::CacheFacts facts;
+            // Times of Maya caches are whole parts of 1/6000 second.
+            constexpr double kTolerance = 0.02;
+            if (readFacts(used, facts) && facts.frameRate > 0.0 &&
+                std::abs(facts.frameRate - context.take.frameRate) > kTolerance)
+                report.add(nameOf(*used.mesh),
+                           rateText(facts.frameRate) + ", and the file has " + rateText(context.take.frameRate));
+        });
 }
 
 } // namespace tool

@@ -23,8 +23,9 @@ const FbxIOFileHeaderInfo& headerOf(const LintContext& context) { return *contex
 
 bool hasOptics(const LintContext& context) {
     return !context.cameras->cameras.empty() ||
-           std::any_of(context.nodes.begin(), context.nodes.end(),
-                       [](const TreeNode& each) { return each.node->GetLight() != nullptr; });
+           std::any_of(
+               context.nodes.begin(), context.nodes.end(),
+               [](const TreeNode& each) { return each.node->GetLight() != nullptr; });
 }
 
 double dotProduct(const FbxVector4& a, const FbxVector4& b) { return a[0] * b[0] + a[1] * b[1] + a[2] * b[2]; }
@@ -40,10 +41,9 @@ bool isUneven(const FbxDouble3& scale) { return scale[0] != scale[1] || scale[1]
 bool changes(const FbxProperty& property, FbxAnimStack* take) {
     for (const Channel& channel : channelsOf(property, take)) {
         for (const LayerCurve& each : channel.curves) {
-            for (int i = 1; i < each.curve->KeyGetCount(); ++i) {
+            for (int i = 1; i < each.curve->KeyGetCount(); ++i)
                 if (each.curve->KeyGetValue(i) != each.curve->KeyGetValue(0))
                     return true;
-            }
         }
     }
     return false;
@@ -51,10 +51,9 @@ bool changes(const FbxProperty& property, FbxAnimStack* take) {
 
 bool isOnlyScaled(const FbxAMatrix& matrix) {
     for (int row = 0; row < 3; ++row) {
-        for (int column = 0; column < 3; ++column) {
+        for (int column = 0; column < 3; ++column)
             if (row == column ? matrix.Get(row, column) < 0.0 : matrix.Get(row, column) != 0.0)
                 return false;
-        }
     }
     return true;
 }
@@ -74,10 +73,9 @@ bool isFinite(const FbxProperty& property) {
     if (components < 2)
         return components == 0 || std::isfinite(property.Get<FbxDouble>());
     const auto numbers = property.Get<FbxDouble4>();
-    for (int i = 0; i < components; ++i) {
+    for (int i = 0; i < components; ++i)
         if (!std::isfinite(numbers[i]))
             return false;
-    }
     return true;
 }
 
@@ -100,10 +98,12 @@ std::string spellingOf(const FbxNode& node, bool hasIds) {
 /// The nodes that the file connects to the root or to another node.
 std::set<std::string> heldModels(const extensions::RecordFile& file) {
     std::set<std::string> models{"0"};
-    forEachObjectRecord(file, [&models](const extensions::FileRecord& record) {
-        if (record.name() == "Model")
-            models.insert(spellingOf(record.value(0)));
-    });
+    forEachObjectRecord(
+        file,
+        [&models](const extensions::FileRecord& record) {
+            if (record.name() == "Model")
+                models.insert(spellingOf(record.value(0)));
+        });
     const auto isModel = [&models](const extensions::RecordValue& value) {
         return isText(value) ? value.text.starts_with("Model::") || value.text.ends_with("\x01Model")
                              : models.contains(spellingOf(value));
@@ -111,20 +111,18 @@ std::set<std::string> heldModels(const extensions::RecordFile& file) {
     std::set<std::string> held;
     for (extensions::FileRecord top = file.first(); top; top = top.nextSibling()) {
         for (extensions::FileRecord each = top.firstChild(); top.name() == "Connections" && each;
-             each = each.nextSibling()) {
+             each = each.nextSibling())
             if (each.valueCount() == 3 && each.value(0).text == "OO" && isModel(each.value(2)))
                 held.insert(spellingOf(each.value(1)));
-        }
     }
     return held;
 }
 
 int badKeys(const Channel& channel) {
     int bad = 0;
-    for (const LayerCurve& each : channel.curves) {
+    for (const LayerCurve& each : channel.curves)
         for (int i = 0; i < each.curve->KeyGetCount(); ++i)
             bad += std::isfinite(each.curve->KeyGetValue(i)) ? 0 : 1;
-    }
     return bad;
 }
 
@@ -204,10 +202,9 @@ void zeroScale(const LintContext& context, LintReport& report) {
 }
 
 void mirroredNode(const LintContext& context, LintReport& report) {
-    for (const TreeNode& each : context.nodes) {
+    for (const TreeNode& each : context.nodes)
         if (each.node->GetMesh() && determinant(context.worldOf(*each.node)) < 0.0)
             report.add(each.node->GetName(), "it is mirrored in the world");
-    }
 }
 
 void shearedNode(const LintContext& context, LintReport& report) {
@@ -272,10 +269,9 @@ void duplicateNames(const LintContext& context, LintReport& report) {
     std::map<std::string, std::size_t> counts;
     for (const TreeNode& each : context.nodes)
         ++counts[each.node->GetName()];
-    for (const auto& [name, count] : counts) {
+    for (const auto& [name, count] : counts)
         if (count > 1 && !name.empty())
             report.add(name, std::to_string(count) + " nodes have this name");
-    }
 }
 
 void unnamedNodes(const LintContext& context, LintReport& report) {
@@ -288,10 +284,9 @@ void unnamedNodes(const LintContext& context, LintReport& report) {
 }
 
 void oddNames(const LintContext& context, LintReport& report) {
-    for (const TreeNode& each : context.nodes) {
+    for (const TreeNode& each : context.nodes)
         if (isOdd(each.node->GetName()))
             report.add(each.node->GetName(), "the name has control characters or invalid UTF-8");
-    }
 }
 
 void unparentedNodes(const LintContext& context, LintReport& report) {

@@ -81,10 +81,9 @@ void takeWithoutKeys(const LintContext& context, LintReport& report) {
     // Not of static scenes.
     if (std::all_of(channels.begin(), channels.end(), [](const auto& each) { return each.empty(); }))
         return;
-    for (std::size_t i = 0; i < context.takes.size(); ++i) {
+    for (std::size_t i = 0; i < context.takes.size(); ++i)
         if (channels[i].empty())
             report.add(context.takes[i].name, "nothing is keyed in the take");
-    }
 }
 
 void severalTakes(const LintContext& context, LintReport& report) {

@@ -30,11 +30,10 @@ OptionFacts factsOf(const CLI::Option& option) {
         facts.names.push_back("-" + name);
     facts.help = option.get_description();
     facts.repeated = option.get_expected_max() > 1;
-    if (facts.names.empty()) {
+    if (facts.names.empty())
         facts.value = option.get_name(/*positional=*/true);
-    } else if (option.get_expected_max() > 0) {
+    else if (option.get_expected_max() > 0)
         facts.value = option.get_type_name();
-    }
     return facts;
 }
 
@@ -70,18 +69,20 @@ std::string escaped(const std::string& text, const std::function<std::string(cha
 // ---- The manual page ----
 
 std::string roff(const std::string& text) {
-    return escaped(text, [](char character) -> std::string {
-        switch (character) {
-        case '\\':
-            return "\\e";
-        case '-':
-            return "\\-";
-        case '\'':
-            return "\\(aq";
-        default:
-            return std::string(1, character);
-        }
-    });
+    return escaped(
+        text,
+        [](char character) -> std::string {
+            switch (character) {
+            case '\\':
+                return "\\e";
+            case '-':
+                return "\\-";
+            case '\'':
+                return "\\(aq";
+            default:
+                return std::string(1, character);
+            }
+        });
 }
 
 void writeOption(const OptionFacts& option, std::ostream& out) {
@@ -142,12 +143,14 @@ void writeBash(const std::vector<CommandFacts>& commands, std::ostream& out) {
 }
 
 std::string zshQuoted(const std::string& text) {
-    return escaped(text, [](char character) -> std::string {
-        if (character == '\'')
-            return "'\\''";
-        return character == '[' || character == ']' || character == ':' ? std::string("\\") + character
-                                                                        : std::string(1, character);
-    });
+    return escaped(
+        text,
+        [](char character) -> std::string {
+            if (character == '\'')
+                return "'\\''";
+            return character == '[' || character == ']' || character == ':' ? std::string("\\") + character
+                                                                            : std::string(1, character);
+        });
 }
 
 void writeZsh(const std::vector<CommandFacts>& commands, std::ostream& out) {
@@ -183,11 +186,12 @@ void writeZsh(const std::vector<CommandFacts>& commands, std::ostream& out) {
 
 std::string fishQuoted(const std::string& text) {
     return '\'' +
-           escaped(text,
-                   [](char character) -> std::string {
-                       return character == '\'' || character == '\\' ? std::string("\\") + character
-                                                                     : std::string(1, character);
-                   }) +
+           escaped(
+               text,
+               [](char character) -> std::string {
+                   return character == '\'' || character == '\\' ? std::string("\\") + character
+                                                                 : std::string(1, character);
+               }) +
            '\'';
 }
 

@@ -16,10 +16,9 @@ namespace {
 
 std::vector<FbxSurfaceMaterial*> materialsOf(const FbxScene& scene) {
     std::vector<FbxSurfaceMaterial*> materials;
-    for (FbxObject* object : extensions::objectsOf(scene)) {
+    for (FbxObject* object : extensions::objectsOf(scene))
         if (auto* material = FbxCast<FbxSurfaceMaterial>(object))
             materials.push_back(material);
-    }
     return materials;
 }
 
@@ -29,19 +28,17 @@ public:
 
     std::vector<MaterialPair> pairs(const std::vector<NodePair>& nodes) {
         matchNames();
-        for (const NodePair& pair : nodes) {
+        for (const NodePair& pair : nodes)
             if (pair.a && pair.b)
                 matchPlaces(*pair.a, *pair.b);
-        }
         std::vector<MaterialPair> pairs;
         for (FbxSurfaceMaterial* material : mA) {
             const auto found = mOfA.find(material);
             pairs.push_back({material, found == mOfA.end() ? nullptr : found->second});
         }
-        for (FbxSurfaceMaterial* material : mB) {
+        for (FbxSurfaceMaterial* material : mB)
             if (!mOfB.contains(material))
                 pairs.push_back({nullptr, material});
-        }
         return pairs;
     }
 
@@ -65,10 +62,9 @@ private:
     }
 
     void matchPlaces(const FbxNode& a, const FbxNode& b) {
-        for (int i = 0; i < std::min(a.GetMaterialCount(), b.GetMaterialCount()); ++i) {
+        for (int i = 0; i < std::min(a.GetMaterialCount(), b.GetMaterialCount()); ++i)
             if (!mOfA.contains(a.GetMaterial(i)) && !mOfB.contains(b.GetMaterial(i)))
                 match(a.GetMaterial(i), b.GetMaterial(i));
-        }
     }
 
     std::vector<FbxSurfaceMaterial*> mA, mB;

@@ -32,10 +32,9 @@ public:
             const auto found = mOfA.find(node);
             pairs.push_back({node, found == mOfA.end() ? nullptr : found->second});
         }
-        for (FbxNode* node : mB) {
+        for (FbxNode* node : mB)
             if (!mOfB.count(node))
                 pairs.push_back({nullptr, node});
-        }
         return pairs;
     }
 
@@ -77,10 +76,9 @@ private:
     template <class Known>
     static ByName leftOf(const std::vector<FbxNode*>& nodes, const Known& known) {
         ByName left;
-        for (FbxNode* node : nodes) {
+        for (FbxNode* node : nodes)
             if (!known.count(node))
                 left[node->GetName()].push_back(node);
-        }
         return left;
     }
 
@@ -98,19 +96,17 @@ private:
 
     void matchRenamed() {
         std::map<std::int64_t, FbxNode*> byId;
-        for (FbxNode* node : mB) {
+        for (FbxNode* node : mB)
             if (!mOfB.count(node))
                 byId[extensions::fileIdOf(*node)] = node;
-        }
         for (FbxNode* node : mA) {
             const auto found = byId.find(extensions::fileIdOf(*node));
             if (found != byId.end())
                 matchIfAlike(*node, found->second);
         }
-        for (FbxNode* node : mA) {
+        for (FbxNode* node : mA)
             if (!mOfA.count(node))
                 matchIfAlike(*node, onlySibling(*node));
-        }
     }
 
     void matchIfAlike(FbxNode& a, FbxNode* b) {
@@ -163,10 +159,9 @@ private:
 
 std::vector<FbxNode*> nodesOfTree(FbxScene& scene) {
     std::vector<FbxNode*> nodes;
-    for (const TreeNode& each : nodesInOrder(scene)) {
+    for (const TreeNode& each : nodesInOrder(scene))
         if (!each.isDetached && !isProducer(*each.node))
             nodes.push_back(each.node);
-    }
     return nodes;
 }
 

@@ -75,14 +75,12 @@ double angleOver(double inches, double focalLengthMillimetres) {
 }
 
 std::string knownGate(const FilmSize& film) {
-    for (const NamedFormat& format : kFormats) {
+    for (const NamedFormat& format : kFormats)
         if (isSize(film, format.film.width, format.film.height))
             return format.name;
-    }
-    for (const Sensor& sensor : kSensors) {
+    for (const Sensor& sensor : kSensors)
         if (isSize(film, sensor.width / kMillimetresPerInch, sensor.height / kMillimetresPerInch))
             return sensor.name;
-    }
     return {};
 }
 

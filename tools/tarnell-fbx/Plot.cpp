@@ -48,10 +48,9 @@ struct Range {
 
 Range rangeOf(const std::vector<double>& values) {
     Range range;
-    for (const double value : values) {
+    for (const double value : values)
         if (std::isfinite(value))
             range = {std::min(range.low, value), std::max(range.high, value)};
-    }
     return range;
 }
 

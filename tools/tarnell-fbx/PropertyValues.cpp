@@ -81,10 +81,9 @@ std::string flagLetters(const FbxProperty& property) {
                     {FbxPropertyFlags::eUserDefined, 'U'},
                     {FbxPropertyFlags::eHidden, 'H'}};
     std::string letters;
-    for (const auto& row : kLetters) {
+    for (const auto& row : kLetters)
         if (property.GetFlag(row.flag))
             letters += row.letter;
-    }
     return letters;
 }
 

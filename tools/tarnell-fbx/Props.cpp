@@ -53,10 +53,9 @@ std::vector<std::string> sourcesOf(const FbxProperty& property) {
 
 std::vector<FbxProperty> chosenProperties(const FbxObject& object, bool all) {
     std::vector<FbxProperty> chosen;
-    for (const FbxProperty& property : propertiesOf(object)) {
+    for (const FbxProperty& property : propertiesOf(object))
         if (all || extensions::isStated(property))
             chosen.push_back(property);
-    }
     return chosen;
 }
 
@@ -80,11 +79,10 @@ void printObject(const FbxObject& object, const PropsOptions& options, FbxAnimSt
         table.addRow({terminalText(property.GetHierarchicalName().Buffer()), terminalText(typeName(property)),
                       flagLetters(property), keys > 0 ? std::to_string(keys) : "", described(property)});
     }
-    if (table.empty()) {
+    if (table.empty())
         out << "  The file states no properties; --all shows those of the class.\n";
-    } else {
+    else
         table.print(out, terminal, 2);
-    }
 }
 
 void printObject(const FbxObject& object, const PropsOptions& options, FbxAnimStack* take, bool hasIds,
@@ -118,31 +116,35 @@ void printObject(const FbxObject& object, const PropsOptions& options, FbxAnimSt
 } // namespace
 
 int props(const PropsOptions& options) {
-    return showFiles(options, "props", [&options](Page& page) -> int {
-        const SceneFile opened(page.file());
-        FbxAnimStack* take = opened.chooseTake(options.take);
-        const std::vector<FbxObject*> objects = chosenObjects(opened.scene(), options.object);
-        if (objects.empty())
-            throw Unreadable(unknownObject(opened.scene(), options.object));
-        if (page.isJson()) {
-            page.json("props", [&](JsonWriter& json) {
-                json.key("objects");
-                json.beginArray();
-                for (const FbxObject* object : objects)
-                    printObject(*object, options, take, opened.hasIds(), json);
-                json.endArray();
-            });
+    return showFiles(
+        options, "props",
+        [&options](Page& page) -> int {
+            const SceneFile opened(page.file());
+            FbxAnimStack* take = opened.chooseTake(options.take);
+            const std::vector<FbxObject*> objects = chosenObjects(opened.scene(), options.object);
+            if (objects.empty())
+                throw Unreadable(unknownObject(opened.scene(), options.object));
+            if (page.isJson()) {
+                page.json(
+                    "props",
+                    [&](JsonWriter& json) {
+                        json.key("objects");
+                        json.beginArray();
+                        for (const FbxObject* object : objects)
+                            printObject(*object, options, take, opened.hasIds(), json);
+                        json.endArray();
+                    });
+                return kSuccess;
+            }
+            std::ostream& out = page.begin();
+            out << page.terminal().paint(Ink::heading, spoken(page.file()))
+                << (take ? "  take " + inQuotes(take->GetName()) : "  no take") << '\n';
+            for (const FbxObject* object : objects) {
+                out << '\n';
+                printObject(*object, options, take, out, page.terminal());
+            }
             return kSuccess;
-        }
-        std::ostream& out = page.begin();
-        out << page.terminal().paint(Ink::heading, spoken(page.file()))
-            << (take ? "  take " + inQuotes(take->GetName()) : "  no take") << '\n';
-        for (const FbxObject* object : objects) {
-            out << '\n';
-            printObject(*object, options, take, out, page.terminal());
-        }
-        return kSuccess;
-    });
+        });
 }
 
 } // namespace tool

@@ -115,10 +115,9 @@ private:
         return mOptions.depth > 0 && level >= first + static_cast<std::size_t>(mOptions.depth) - 1;
     }
     [[nodiscard]] bool finds(FileRecord record, std::size_t level) const {
-        for (; record; record = record.nextSibling()) {
+        for (; record; record = record.nextSibling())
             if (isOnPath(record, level) && (isWanted(level) || finds(record.firstChild(), level + 1)))
                 return true;
-        }
         return false;
     }
     [[nodiscard]] std::size_t shown(std::uint64_t count) const {
@@ -197,11 +196,10 @@ private:
         for (; record; record = record.nextSibling()) {
             if (!isOnPath(record, level))
                 continue;
-            if (isWanted(level)) {
+            if (isWanted(level))
                 printObject(record, level, json);
-            } else {
+            else
                 printObjects(record.firstChild(), level + 1, json);
-            }
         }
     }
 
@@ -288,21 +286,23 @@ private:
 } // namespace
 
 int records(const RecordsOptions& options) {
-    return showFiles(options, "records", [&options](Page& page) -> int {
-        FbxStatus status;
-        const std::unique_ptr<RecordFile> file = RecordFile::open(page.file().c_str(), status);
-        if (!file)
-            throw Unreadable(status.GetErrorString());
-        RecordPage content(*file, options);
-        if (!content.any())
-            throw Unreadable("there is no record " + options.path);
-        if (page.isJson()) {
-            page.json("records", [&](JsonWriter& json) { content.printJson(json); });
-        } else {
-            content.printText(page);
-        }
-        return kSuccess;
-    });
+    return showFiles(
+        options, "records",
+        [&options](Page& page) -> int {
+            FbxStatus status;
+            const std::unique_ptr<RecordFile> file = RecordFile::open(page.file().c_str(), status);
+            if (!file)
+                throw Unreadable(status.GetErrorString());
+            RecordPage content(*file, options);
+            if (!content.any())
+                throw Unreadable("there is no record " + options.path);
+            if (page.isJson())
+                page.json(
+                    "records", [&](JsonWriter& json) { content.printJson(json); });
+            else
+                content.printText(page);
+            return kSuccess;
+        });
 }
 
 } // namespace tool

@@ -23,10 +23,9 @@ namespace filesystem = std::filesystem;
 /// Why the page must not be written; empty when it may. An existing report is replaced.
 std::string refusal(const ReportOptions& options, const std::vector<std::string>& files) {
     std::error_code ignored;
-    for (const std::string& file : files) {
+    for (const std::string& file : files)
         if (filesystem::equivalent(file, options.output, ignored))
             return "is also an input file";
-    }
     if (options.force || !filesystem::exists(options.output, ignored))
         return {};
     std::string start(ReportPage::mark().size(), '\0');

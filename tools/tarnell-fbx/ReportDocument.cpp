@@ -264,19 +264,17 @@ private:
     void printArrays(const ReportShape& shape) {
         mJson.key("corners");
         mJson.beginArray();
-        for (const auto& triangle : shape.mesh.triangles) {
+        for (const auto& triangle : shape.mesh.triangles)
             for (const auto corner : triangle)
                 mJson.integer(static_cast<long long>(corner));
-        }
         mJson.endArray();
         mJson.key("sets");
         mJson.beginArray();
         for (const std::vector<Point>& set : shape.sets) {
             mJson.beginArray();
-            for (const Point& point : set) {
+            for (const Point& point : set)
                 for (const float coordinate : point)
                     mJson.real(coordinate);
-            }
             mJson.endArray();
         }
         mJson.endArray();

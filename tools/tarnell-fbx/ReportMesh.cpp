@@ -69,10 +69,9 @@ public:
         }
         mSide = static_cast<std::size_t>(std::sqrt(static_cast<double>(corners.size()))) + 1;
         mCells.resize(mSide * mSide);
-        for (std::uint32_t i = 0; i < corners.size(); ++i) {
+        for (std::uint32_t i = 0; i < corners.size(); ++i)
             if (turn(corners[corners[i].before], corners[i], corners[corners[i].after]) < 0.0)
                 mCells[column(corners[i].y, 1) * mSide + column(corners[i].x, 0)].push_back(i);
-        }
     }
 
     /// Whether any lies in the triangle; those on its edge count unless `withinOnly`.
@@ -81,10 +80,9 @@ public:
         const auto [bottom, top] = std::minmax({a.y, b.y, c.y});
         for (std::size_t y = column(bottom, 1); y <= column(top, 1); ++y) {
             for (std::size_t x = column(left, 0); x <= column(right, 0); ++x) {
-                for (const std::uint32_t i : mCells[y * mSide + x]) {
+                for (const std::uint32_t i : mCells[y * mSide + x])
                     if (isIn(i, a, b, c, withinOnly))
                         return true;
-                }
             }
         }
         return false;
@@ -163,20 +161,18 @@ void cut(const std::vector<std::uint32_t>& polygon, const std::vector<Point>& po
 void keepUsedPoints(ReportMesh& mesh, const std::vector<std::uint32_t>& numbers) {
     constexpr std::uint32_t kUnused = std::numeric_limits<std::uint32_t>::max();
     std::vector<std::uint32_t> places(numbers.size(), kUnused), kept;
-    for (const Triangle& triangle : mesh.triangles) {
+    for (const Triangle& triangle : mesh.triangles)
         for (const std::uint32_t corner : triangle)
             places[corner] = 0;
-    }
     for (std::size_t i = 0; i < places.size(); ++i) {
         if (places[i] == kUnused)
             continue;
         places[i] = static_cast<std::uint32_t>(kept.size());
         kept.push_back(numbers[i]);
     }
-    for (Triangle& triangle : mesh.triangles) {
+    for (Triangle& triangle : mesh.triangles)
         for (std::uint32_t& corner : triangle)
             corner = places[corner];
-    }
     mesh.kept = std::move(kept);
 }
 
@@ -253,11 +249,10 @@ ReportMesh triangulated(const TnFbxMesh& mesh) {
             if (point < points.size() && isFinite(points[point]))
                 polygon.push_back(static_cast<std::uint32_t>(point));
         }
-        if (polygon.size() != static_cast<std::size_t>(std::max(size, 0))) {
+        if (polygon.size() != static_cast<std::size_t>(std::max(size, 0)))
             ++result.droppedPolygons;
-        } else if (size >= 3) {
+        else if (size >= 3)
             cut(polygon, points, result.triangles);
-        }
     }
     result.triangleCount = result.triangles.size();
     std::vector<std::uint32_t> all(points.size());

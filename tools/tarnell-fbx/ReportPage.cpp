@@ -18,12 +18,11 @@ void put(std::ostream& out, std::span<const std::string_view> pieces) {
 std::string withoutMarkup(const std::string& json) {
     std::string text;
     text.reserve(json.size());
-    for (const char c : json) {
+    for (const char c : json)
         if (c == '<')
             text += "\\u003c";
         else
             text += c;
-    }
     return text;
 }
 

@@ -131,13 +131,15 @@ void ReportScene::boundFrames(const ReportWishes& wishes) {
     std::size_t moving = 0;
     long long first = mFrames.first, last = first + mFrames.count - 1;
     for (const ReportNode& node : mNodes) {
-        eachChannel(node, [&](const TnFbxChannel& channel) {
-            if (!channel.getAnimated())
-                return;
-            ++moving;
-            first = static_cast<long long>(channel.getTime().getStartFrame()) * mSampleStep; // the same for all
-            last = static_cast<long long>(channel.getTime().getEndFrame()) * mSampleStep;
-        });
+        eachChannel(
+            node,
+            [&](const TnFbxChannel& channel) {
+                if (!channel.getAnimated())
+                    return;
+                ++moving;
+                first = static_cast<long long>(channel.getTime().getStartFrame()) * mSampleStep; // the same for all
+                last = static_cast<long long>(channel.getTime().getEndFrame()) * mSampleStep;
+            });
     }
     const long long all = last - first + 1;
     if (wishes.frames) {
@@ -172,10 +174,9 @@ void ReportScene::boundFrames(const ReportWishes& wishes) {
 template <class Object>
 ReportScene::Objects<Object> ReportScene::read(Reader<Object> reader) {
     FaithfulObjects<Object> read = readFaithfully<Object>(mInfo, reader);
-    for (const std::string& warning : read.warnings) {
+    for (const std::string& warning : read.warnings)
         if (mKnownWarnings.insert(warning).second)
             mWarnings.push_back(warning);
-    }
     return {std::move(read.objects), read.count};
 }
 
@@ -207,15 +208,14 @@ void ReportScene::linkNodes() {
         ReportNode node{tree};
         const FbxNodeAttribute::EType type = typeOf(*tree.node);
         node.transform = next(mTransforms, *tree.node);
-        if (isCamera(type)) {
+        if (isCamera(type))
             node.transform = node.camera = next(mCameras, *tree.node);
-        } else if (type == FbxNodeAttribute::eLight) {
+        else if (type == FbxNodeAttribute::eLight)
             node.transform = node.light = next(mLights, *tree.node);
-        } else if (type == FbxNodeAttribute::eNull) {
+        else if (type == FbxNodeAttribute::eNull)
             node.null = next(mNulls, *tree.node);
-        } else if (isMesh(type)) {
+        else if (isMesh(type))
             node.mesh = meshes++;
-        }
         mNodes.push_back(node);
     }
 }

@@ -69,10 +69,9 @@ std::string unitName(double centimetres) {
         const char* name;
     } kUnits[] = {{0.1, "millimetre"}, {1.0, "centimetre"}, {10.0, "decimetre"}, {100.0, "metre"},  {1e5, "kilometre"},
                   {2.54, "inch"},      {30.48, "foot"},     {91.44, "yard"},     {160934.4, "mile"}};
-    for (const auto& unit : kUnits) {
+    for (const auto& unit : kUnits)
         if (unit.scale == centimetres)
             return unit.name;
-    }
     return numberText(centimetres) + " cm";
 }
 
@@ -114,10 +113,9 @@ const char* kindOf(const FbxNode& node) {
                   {FbxNodeAttribute::eSubDiv, "subdivision surface"},
                   {FbxNodeAttribute::eCachedEffect, "cached effect"},
                   {FbxNodeAttribute::eLine, "line"}};
-    for (const auto& kind : kKinds) {
+    for (const auto& kind : kKinds)
         if (kind.type == attribute->GetAttributeType())
             return kind.name;
-    }
     return "unknown attribute";
 }
 

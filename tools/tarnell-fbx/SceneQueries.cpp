@@ -46,10 +46,9 @@ std::vector<TreeNode> nodesInOrder(FbxScene& scene) {
 }
 
 bool isAnimated(const FbxProperty& property) {
-    for (int i = 0; i < property.GetSrcObjectCount<FbxAnimCurveNode>(); ++i) {
+    for (int i = 0; i < property.GetSrcObjectCount<FbxAnimCurveNode>(); ++i)
         if (property.GetSrcObject<FbxAnimCurveNode>(i)->IsAnimated())
             return true;
-    }
     return false;
 }
 
@@ -91,10 +90,9 @@ std::vector<FbxProperty> propertiesOf(const FbxObject& object) {
 
 std::vector<FbxObject*> objectsNamed(FbxScene& scene, const std::string& name) {
     std::vector<FbxObject*> found;
-    for (FbxObject* object : extensions::objectsOf(scene)) {
+    for (FbxObject* object : extensions::objectsOf(scene))
         if (!name.empty() && name == object->GetName())
             found.push_back(object);
-    }
     std::stable_partition(found.begin(), found.end(), [](const FbxObject* object) { return object->Is<FbxNode>(); });
     return found;
 }
@@ -122,11 +120,10 @@ std::string unknownObject(FbxScene& scene, const std::string& name) {
 
 void printId(const FbxObject& object, bool hasIds, JsonWriter& json) {
     json.key("id");
-    if (hasIds) {
+    if (hasIds)
         json.integer(extensions::fileIdOf(object));
-    } else {
+    else
         json.null();
-    }
 }
 
 } // namespace tool

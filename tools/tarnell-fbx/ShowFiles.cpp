@@ -71,11 +71,10 @@ public:
         if (mFiles.empty() && mForm != Form::json)
             return mStatus;
         std::cout << mFrame.before;
-        if (mWorkers > 1) {
+        if (mWorkers > 1)
             runTogether();
-        } else {
+        else
             runInTurn();
-        }
         std::cout << mFrame.after;
         return mStatus;
     }
@@ -94,10 +93,12 @@ private:
             mProgress.hide();
             printError(file, outcome.reason);
             if (page.isJson() && !page.begun()) {
-                page.json(mCommand, [&](JsonWriter& json) {
-                    json.key("error");
-                    json.text(outcome.reason);
-                });
+                page.json(
+                    mCommand,
+                    [&](JsonWriter& json) {
+                        json.key("error");
+                        json.text(outcome.reason);
+                    });
             }
         }
         return outcome.status;

@@ -63,10 +63,9 @@ std::vector<std::string> mostSimilar(std::string_view text, const std::vector<st
             ranked.emplace(distance, &name);
     }
     std::vector<std::string> best;
-    for (const auto& [distance, name] : ranked) {
+    for (const auto& [distance, name] : ranked)
         if (best.size() < kMostNames && std::find(best.begin(), best.end(), *name) == best.end())
             best.push_back(*name);
-    }
     return best;
 }
 

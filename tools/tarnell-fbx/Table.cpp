@@ -30,12 +30,10 @@ void Table::print(std::ostream& out, const Terminal& terminal, std::size_t inden
             const bool toTheRight = mColumns[i].align == Align::right;
             // Blanks are written only when something follows them.
             line += text.empty() ? "" : blanks + (toTheRight ? padding : "");
-            if (!text.empty()) {
+            if (!text.empty())
                 blanks.clear();
-            }
-            if (text.empty() || !toTheRight) {
+            if (text.empty() || !toTheRight)
                 blanks += padding;
-            }
             line += terminal.paint(isTitle ? Ink::faint : mColumns[i].ink, text);
             blanks += "  ";
             taken += width[i] + 2;

@@ -42,13 +42,12 @@ std::string terminalText(std::string_view text) {
     shown.reserve(text.size());
     for (std::size_t at = 0; at < text.size();) {
         const Utf8Character character = utf8At(text, at);
-        if (!character.valid) {
+        if (!character.valid)
             shown += "\\x" + hexadecimal(static_cast<unsigned char>(text[at]), 2);
-        } else if (character.code < 0x20 || character.code == 0x7F || isInvisibleControl(character.code)) {
+        else if (character.code < 0x20 || character.code == 0x7F || isInvisibleControl(character.code))
             shown += spelt(character.code);
-        } else {
+        else
             shown += text.substr(at, character.size);
-        }
         at += character.size;
     }
     return shown;

@@ -71,10 +71,9 @@ NodeFacts factsOf(FbxNode& node) {
         const std::string name = attribute->GetName();
         facts.attribute = name == node.GetName() ? std::string() : name;
     }
-    if (const FbxGeometry* geometry = node.GetGeometry()) {
+    if (const FbxGeometry* geometry = node.GetGeometry())
         for (int i = 0; i < geometry->GetDeformerCount(); ++i)
             facts.deformers.push_back(deformerText(*geometry->GetDeformer(i)));
-    }
     for (int i = 0; i < node.GetMaterialCount(); ++i)
         facts.materials.emplace_back(node.GetMaterial(i)->GetName());
     return facts;
@@ -182,11 +181,10 @@ void printNode(const TreeNode& node, bool hasIds, JsonWriter& json) {
     json.boolean("hidden", facts.hidden);
     json.text("rotationOrder", facts.rotationOrder);
     json.key("target");
-    if (facts.target.empty()) {
+    if (facts.target.empty())
         json.null();
-    } else {
+    else
         json.text(facts.target);
-    }
     json.key("attribute");
     if (attribute) {
         json.beginObject();
@@ -206,24 +204,27 @@ void printNode(const TreeNode& node, bool hasIds, JsonWriter& json) {
 } // namespace
 
 int tree(const TreeOptions& options) {
-    return showFiles(options, "tree", [&options](Page& page) -> int {
-        const SceneFile opened(page.file());
-        const std::vector<TreeNode> nodes = nodesInOrder(opened.scene());
-        if (!page.isJson()) {
-            printText(nodes, options.depth, page);
-            return kSuccess;
-        }
-        page.json("tree", [&](JsonWriter& json) {
-            json.key("nodes");
-            json.beginArray();
-            for (const TreeNode& node : nodes) {
-                if (options.depth == 0 || node.depth < options.depth)
-                    printNode(node, opened.hasIds(), json);
+    return showFiles(
+        options, "tree",
+        [&options](Page& page) -> int {
+            const SceneFile opened(page.file());
+            const std::vector<TreeNode> nodes = nodesInOrder(opened.scene());
+            if (!page.isJson()) {
+                printText(nodes, options.depth, page);
+                return kSuccess;
             }
-            json.endArray();
+            page.json(
+                "tree",
+                [&](JsonWriter& json) {
+                    json.key("nodes");
+                    json.beginArray();
+                    for (const TreeNode& node : nodes)
+                        if (options.depth == 0 || node.depth < options.depth)
+                            printNode(node, opened.hasIds(), json);
+                    json.endArray();
+                });
+            return kSuccess;
         });
-        return kSuccess;
-    });
 }
 
 } // namespace tool

@@ -15,7 +15,8 @@ struct CodeRange {
 };
 
 bool isIn(const CodeRange* begin, const CodeRange* end, char32_t code) {
-    return std::any_of(begin, end, [=](const CodeRange& range) { return code >= range.first && code <= range.last; });
+    return std::any_of(
+        begin, end, [=](const CodeRange& range) { return code >= range.first && code <= range.last; });
 }
 
 /// The blocks that names are likely to use; a table of all characters would be disproportionate.

@@ -233,7 +233,8 @@ int run(int argc, char** argv) {
     for (std::string* file : {&dumpOptions.file, &convertOptions.input})
         takeStandardInput(*file);
     if (app.got_subcommand("convert"))
-        return tool::guarded(convertOptions.input, [&] { return tool::convert(convertOptions); });
+        return tool::guarded(
+            convertOptions.input, [&] { return tool::convert(convertOptions); });
     return tool::guarded(dumpOptions.file, [&] { return tool::dump(dumpOptions); });
 }
 

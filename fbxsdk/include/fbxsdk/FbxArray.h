@@ -37,9 +37,8 @@ public:
 
     /// The index of the first equal element at or after the start; -1 when there is none.
     [[nodiscard]] int Find(const T& pElement, int pStartIndex = 0) const {
-        if (pStartIndex < 0 || pStartIndex >= GetCount()) {
+        if (pStartIndex < 0 || pStartIndex >= GetCount())
             return -1;
-        }
         const auto found = std::find(mItems.begin() + pStartIndex, mItems.end(), pElement);
         return found == mItems.end() ? -1 : static_cast<int>(found - mItems.begin());
     }
@@ -56,9 +55,8 @@ public:
     }
     /// An index beyond the end appends; a negative one does nothing and gives -1.
     int InsertAt(int pIndex, const T& pElement) {
-        if (pIndex < 0) {
+        if (pIndex < 0)
             return -1;
-        }
         const int index = std::min(pIndex, GetCount());
         mItems.insert(mItems.begin() + index, pElement);
         return index;

@@ -41,9 +41,8 @@ double parameterAt(double part, double right, double left) {
     double u = part;
     for (int step = 0; step < kSteps; ++step) {
         const double error = bezier(0.0, right, 1.0 - left, 1.0, u) - part;
-        if (std::abs(error) <= kPrecision) {
+        if (std::abs(error) <= kPrecision)
             break;
-        }
         (error > 0.0 ? high : low) = u;
         const double v = 1.0 - u;
         const double slope = 3.0 * (v * v * right + 2.0 * v * u * (1.0 - left - right) + u * u * left);
@@ -77,9 +76,8 @@ inline double cubicValue(const CubicSegment& segment, double passed) {
 /// The value strictly between a key and the next one.
 double segmentValue(const CurveKeys& keys, std::size_t key, std::int64_t ticks, CurveCursor& cursor) {
     const double passed = static_cast<double>(ticksBetween(keys.times[key], ticks));
-    if (cursor.cubic.key == key) {
+    if (cursor.cubic.key == key)
         return cubicValue(cursor.cubic, passed);
-    }
     const double start = valueOf(keys, key);
     const double end = valueOf(keys, key + 1);
     switch (interpolationOf(keys, key)) {
@@ -158,9 +156,8 @@ double valueAfterRepetitions(const CurveKeys& keys, const Extrapolation& extrapo
     const double last = valueOf(keys, keys.keyCount() - 1);
     const double here = side == Side::after ? last : first;
     const double there = side == Side::after ? first : last;
-    if (extrapolation.type == ExtrapolationType::mirrorRepetition) {
+    if (extrapolation.type == ExtrapolationType::mirrorRepetition)
         return extrapolation.count % 2 == 0 ? here : there;
-    }
     const bool relative = extrapolation.type == ExtrapolationType::relativeRepetition;
     return relative ? here + (here - there) * extrapolation.count : here;
 }
@@ -171,25 +168,22 @@ double repeatedValue(const CurveKeys& keys, const Extrapolation& extrapolation, 
     const std::int64_t first = keys.times[0];
     const std::uint64_t length = ticksBetween(first, keys.times[lastKey]);
     const Repetition repetition = repetitionOf(first, length, ticks, side);
-    if (extrapolation.count >= 0 && repetition.number > static_cast<std::uint64_t>(extrapolation.count)) {
+    if (extrapolation.count >= 0 && repetition.number > static_cast<std::uint64_t>(extrapolation.count))
         return valueAfterRepetitions(keys, extrapolation, side);
-    }
 
     const bool mirrored = extrapolation.type == ExtrapolationType::mirrorRepetition && repetition.number % 2 == 1;
     const std::uint64_t offset = mirrored ? length - repetition.offset : repetition.offset;
     const auto inside = static_cast<std::int64_t>(static_cast<std::uint64_t>(first) + offset);
     const double value = valueWithin(keys, inside, cursor);
-    if (extrapolation.type != ExtrapolationType::relativeRepetition) {
+    if (extrapolation.type != ExtrapolationType::relativeRepetition)
         return value;
-    }
     const double rise = (valueOf(keys, lastKey) - valueOf(keys, 0)) * static_cast<double>(repetition.number);
     return side == Side::after ? value + rise : value - rise;
 }
 
 double keptSlopeValue(const CurveKeys& keys, std::int64_t ticks, Side side) {
-    if (side == Side::before) {
+    if (side == Side::before)
         return valueOf(keys, 0) - rightSlope(keys, 0) * secondsBetween(ticks, keys.times[0]);
-    }
     const std::size_t last = keys.keyCount() - 1;
     return valueOf(keys, last) + leftSlope(keys, last) * secondsBetween(keys.times[last], ticks);
 }
@@ -221,15 +215,12 @@ float evaluate(const CurveKeys& keys, std::int64_t ticks, CurveCursor* cursor) {
     CurveCursor once;
     CurveCursor& used = cursor != nullptr ? *cursor : once;
     const std::size_t count = keys.keyCount();
-    if (count == 0) {
+    if (count == 0)
         return keys.defaultValue;
-    }
-    if (ticks < keys.times[0]) {
+    if (ticks < keys.times[0])
         return toFloat(extrapolatedValue(keys, ticks, Side::before, used));
-    }
-    if (ticks > keys.times[count - 1]) {
+    if (ticks > keys.times[count - 1])
         return toFloat(extrapolatedValue(keys, ticks, Side::after, used));
-    }
     return toFloat(valueWithin(keys, ticks, used));
 }
 
@@ -238,16 +229,14 @@ void evaluate(const CurveKeys& keys, const FbxTime* times, int count, float* val
     for (int i = 0; i < count; ++i) {
         values[i] = evaluate(keys, times[i].Get(), &cursor);
         const std::size_t key = cursor.segment;
-        if (key != cursor.cubic.key || key + 1 >= keys.keyCount()) {
+        if (key != cursor.cubic.key || key + 1 >= keys.keyCount())
             continue;
-        }
         // The following times in the same cubic segment, most of the samples, and at the key at its end.
         const CubicSegment cubic = cursor.cubic;
         const std::int64_t start = keys.times[key];
         const std::int64_t end = keys.times[key + 1];
-        for (; i + 1 < count && start < times[i + 1].Get() && times[i + 1].Get() < end; ++i) {
+        for (; i + 1 < count && start < times[i + 1].Get() && times[i + 1].Get() < end; ++i)
             values[i + 1] = toFloat(cubicValue(cubic, static_cast<double>(ticksBetween(start, times[i + 1].Get()))));
-        }
         const bool isOnlyKeyThere = key + 2 == keys.keyCount() || end < keys.times[key + 2];
         if (i + 1 < count && times[i + 1].Get() == end && isOnlyKeyThere) {
             ++i;

@@ -16,12 +16,10 @@ enum class Interpolation { constant, constantNext, linear, cubic };
 
 [[nodiscard]] inline Interpolation interpolationOf(const CurveKeys& keys, std::size_t key) {
     const std::uint32_t flags = keys.attributesOf(key).flags;
-    if ((flags & KeyFlag::cubic) != 0) {
+    if ((flags & KeyFlag::cubic) != 0)
         return Interpolation::cubic;
-    }
-    if ((flags & KeyFlag::linear) != 0) {
+    if ((flags & KeyFlag::linear) != 0)
         return Interpolation::linear;
-    }
     return (flags & KeyFlag::constantNext) != 0 ? Interpolation::constantNext : Interpolation::constant;
 }
 

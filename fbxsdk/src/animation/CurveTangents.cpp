@@ -55,12 +55,10 @@ Neighbourhood neighbourhoodOf(const CurveKeys& keys, std::size_t key) {
         n.rightSeconds = secondsBetween(keys.times[key], keys.times[key + 1]);
         n.rightChord = chord(n.rightRise, n.rightSeconds);
     }
-    if (!n.hasLeft) {
+    if (!n.hasLeft)
         n.leftChord = n.rightChord;
-    }
-    if (!n.hasRight) {
+    if (!n.hasRight)
         n.rightChord = n.leftChord;
-    }
     return n;
 }
 
@@ -79,9 +77,8 @@ double biased(double slope, double bias, const Neighbourhood& n) {
 
 /// Shortens a slope so that a handle of that many seconds does not exceed the adjacent value.
 double limited(double slope, double rise, double handleSeconds) {
-    if (!(slope * rise > 0.0)) {
+    if (!(slope * rise > 0.0))
         return 0.0;
-    }
     const double limit = std::abs(rise) / handleSeconds;
     return std::abs(slope) > limit ? std::copysign(limit, slope) : slope;
 }
@@ -102,20 +99,17 @@ double autoSlope(const CurveKeys& keys, std::size_t key, double bias) {
     const bool timeIndependent = isTimeIndependent(flags);
     const Neighbourhood n = neighbourhoodOf(keys, key);
     const bool inside = n.hasLeft && n.hasRight;
-    if (progressive && !inside) {
+    if (progressive && !inside)
         return 0.0;
-    }
 
     double slope = (n.leftChord + n.rightChord) / 2.0;
-    if (timeIndependent && inside) {
+    if (timeIndependent && inside)
         slope = chord(n.leftRise + n.rightRise, n.leftSeconds + n.rightSeconds);
-    } else if (!timeIndependent) {
+    else if (!timeIndependent)
         slope = biased(slope, bias, n);
-    }
 
-    if ((flags & KeyFlag::genericClamp) != 0 && isFlat(n)) {
+    if ((flags & KeyFlag::genericClamp) != 0 && isFlat(n))
         return 0.0;
-    }
     if (progressive) {
         slope = limited(slope, n.leftRise, leftWeight(keys, key) * n.leftSeconds);
         slope = limited(slope, n.rightRise, rightWeight(keys, key) * n.rightSeconds);
@@ -146,21 +140,18 @@ enum class Tangent { stored, automatic, tcb };
 
 Tangent tangentOf(const KeyAttributes& attributes) {
     const std::uint32_t flags = attributes.flags;
-    if ((flags & (KeyFlag::tangentUser | KeyFlag::constant)) != 0) {
+    if ((flags & (KeyFlag::tangentUser | KeyFlag::constant)) != 0)
         return Tangent::stored; // the auto bit of a constant key means "next"
-    }
-    if ((flags & KeyFlag::tangentTcb) != 0) {
+    if ((flags & KeyFlag::tangentTcb) != 0)
         return Tangent::tcb;
-    }
     return (flags & KeyFlag::tangentAuto) != 0 ? Tangent::automatic : Tangent::stored;
 }
 
 /// The number stored for the left side of a key. The first key has none, nor has one after a TCB key, where that number
 /// is the continuity: they are smooth, so the number of the right side is used (a bias with the other sign).
 double storedLeft(const CurveKeys& keys, std::size_t key, Tangent tangent) {
-    if (key > 0 && tangentOf(keys.attributesOf(key - 1)) != Tangent::tcb) {
+    if (key > 0 && tangentOf(keys.attributesOf(key - 1)) != Tangent::tcb)
         return static_cast<double>(keys.attributesOf(key - 1).data[KeyData::nextLeftSlope]);
-    }
     const double right = static_cast<double>(keys.attributesOf(key).data[KeyData::rightSlope]);
     return tangent == Tangent::automatic ? -right : right;
 }
@@ -168,9 +159,8 @@ double storedLeft(const CurveKeys& keys, std::size_t key, Tangent tangent) {
 double usableWeight(float weight) {
     constexpr float kSmallest = 0.0001F;
     constexpr float kLargest = 0.99F;
-    if (!(weight >= kSmallest)) {
+    if (!(weight >= kSmallest))
         return std::isnan(weight) ? kEqualWeight : static_cast<double>(kSmallest);
-    }
     return static_cast<double>(weight > kLargest ? kLargest : weight);
 }
 
@@ -207,18 +197,16 @@ double cubicLeftSlope(const CurveKeys& keys, std::size_t key) {
 bool hasAbsoluteBias(const CurveKeys& keys, std::size_t key) {
     const KeyAttributes& attributes = keys.attributesOf(key);
     const Tangent tangent = tangentOf(attributes);
-    if (tangent != Tangent::automatic || isTimeIndependent(attributes.flags)) {
+    if (tangent != Tangent::automatic || isTimeIndependent(attributes.flags))
         return false;
-    }
     const double right = static_cast<double>(attributes.data[KeyData::rightSlope]);
     return std::abs(right) > kAbsoluteBias || std::abs(storedLeft(keys, key, tangent)) > kAbsoluteBias;
 }
 
 /// The slope of a segment that is no cubic.
 double straightSlope(const CurveKeys& keys, std::size_t segment) {
-    if (interpolationOf(keys, segment) != Interpolation::linear || segment + 1 >= keys.keyCount()) {
+    if (interpolationOf(keys, segment) != Interpolation::linear || segment + 1 >= keys.keyCount())
         return 0.0;
-    }
     return neighbourhoodOf(keys, segment).rightChord;
 }
 
@@ -231,9 +219,8 @@ double rightWeight(const CurveKeys& keys, std::size_t key) {
 }
 
 double leftWeight(const CurveKeys& keys, std::size_t key) {
-    if (key == 0) {
+    if (key == 0)
         return kEqualWeight;
-    }
     const KeyAttributes& attributes = keys.attributesOf(key - 1);
     const bool weighted = (attributes.flags & KeyFlag::weightedNextLeft) != 0 && tangentOf(attributes) != Tangent::tcb;
     return weighted ? usableWeight(attributes.data[KeyData::nextLeftWeight]) : kEqualWeight;
@@ -263,22 +250,19 @@ void multiplyValues(CurveKeys& keys, float factor) {
             attributes.flags =
                 (attributes.flags & ~KeyFlag::tangentAuto) | KeyFlag::tangentUser | KeyFlag::genericBreak;
         }
-        if (tangent == Tangent::stored || hasAbsoluteBias(keys, key)) {
+        if (tangent == Tangent::stored || hasAbsoluteBias(keys, key))
             attributes.data[KeyData::rightSlope] = multiplied(cubicRightSlope(keys, key));
-        }
         const std::size_t next = key + 1;
         const bool hasNext = next < keys.keyCount() && tangent != Tangent::tcb;
-        if (hasNext && (tangentOf(keys.attributesOf(next)) == Tangent::stored || hasAbsoluteBias(keys, next))) {
+        if (hasNext && (tangentOf(keys.attributesOf(next)) == Tangent::stored || hasAbsoluteBias(keys, next)))
             attributes.data[KeyData::nextLeftSlope] = multiplied(cubicLeftSlope(keys, next));
-        }
         result.setAttributes(key, attributes);
     }
 
     keys.attributes = std::move(result.attributes);
     keys.attributeOfKey = std::move(result.attributeOfKey);
-    for (float& value : keys.values) {
+    for (float& value : keys.values)
         value *= factor;
-    }
     keys.defaultValue *= factor;
 }
 

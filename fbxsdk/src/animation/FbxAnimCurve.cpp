@@ -378,10 +378,9 @@ struct Channel {
 Channel channelOf(const FbxAnimCurve& curve, int curveNodeIndex) {
     auto* node = curve.GetDstObject<FbxAnimCurveNode>(curveNodeIndex);
     for (unsigned int i = 0; node && i < node->GetChannelsCount(); ++i) {
-        for (unsigned int id = 0; node->GetCurve(i, id); ++id) {
+        for (unsigned int id = 0; node->GetCurve(i, id); ++id)
             if (node->GetCurve(i, id) == &curve)
                 return {node, i};
-        }
     }
     return {nullptr, 0};
 }

@@ -104,10 +104,13 @@ bool FbxAnimCurveNode::DisconnectFromChannel(FbxAnimCurve* pCurve, unsigned int 
 }
 
 bool FbxAnimCurveNode::IsAnimated(bool) const {
-    return std::any_of(mChannels.begin(), mChannels.end(), [](const Channel& channel) {
-        return std::any_of(channel.curves.begin(), channel.curves.end(),
-                           [](const FbxAnimCurve* curve) { return curve->KeyGetCount() > 0; });
-    });
+    return std::any_of(
+        mChannels.begin(), mChannels.end(),
+        [](const Channel& channel) {
+            return std::any_of(
+                channel.curves.begin(), channel.curves.end(),
+                [](const FbxAnimCurve* curve) { return curve->KeyGetCount() > 0; });
+        });
 }
 
 bool FbxAnimCurveNode::GetAnimationInterval(FbxTimeSpan& pTimeInterval) const {
@@ -178,8 +181,9 @@ void FbxAnimCurveNode::connectionChanged(FbxObject& pSource, FbxObject& pDestina
     if (mUses.erase(&pSource) == 0)
         return;
     for (Channel& channel : mChannels) {
-        std::erase_if(channel.curves,
-                      [&](const FbxAnimCurve* curve) { return static_cast<const FbxObject*>(curve) == &pSource; });
+        std::erase_if(
+            channel.curves,
+            [&](const FbxAnimCurve* curve) { return static_cast<const FbxObject*>(curve) == &pSource; });
     }
 }
 

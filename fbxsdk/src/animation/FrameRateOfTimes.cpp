@@ -85,10 +85,9 @@ double meantRate(double rate) {
     const auto* const usual = std::find_if(std::begin(kUsualRates), std::end(kUsualRates), isMeant);
     if (usual != std::end(kUsualRates))
         return *usual;
-    for (const double candidate : {std::round(rate), std::round(rate * 100.0) / 100.0, slowed}) {
+    for (const double candidate : {std::round(rate), std::round(rate * 100.0) / 100.0, slowed})
         if (isMeant(candidate))
             return candidate;
-    }
     return rate;
 }
 
@@ -103,10 +102,9 @@ double frameRateOfTimes(std::span<const std::int64_t> times) {
     if (byDistance >= kSlowest * (1.0 - kSameRate) && byDistance <= kFastest * (1.0 + kSameRate) &&
         fits(times, measured(times, byDistance)))
         return meantRate(measured(times, byDistance));
-    for (const double rate : kUsualRates) {
+    for (const double rate : kUsualRates)
         if (fits(times, rate))
             return meantRate(measured(times, rate));
-    }
     return 0.0;
 }
 

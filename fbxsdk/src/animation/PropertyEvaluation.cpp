@@ -99,21 +99,18 @@ Components addLayer(const Components& below, const Components& layer, double wei
     Components sum = below;
     const bool multiplies =
         rule == LayerRule::scaling && settings.ScaleAccumulationMode.Get() == FbxAnimLayer::eScaleMultiply;
-    for (std::size_t i = 0; i < sum.size(); ++i) {
-        if (multiplies) {
+    for (std::size_t i = 0; i < sum.size(); ++i)
+        if (multiplies)
             sum[i] *= weightedFactor(layer[i], weight);
-        } else {
+        else
             sum[i] += weight * layer[i];
-        }
-    }
     return sum;
 }
 
 Components overrideLayer(const Components& below, const Components& layer, double weight, LayerRule rule,
                          const FbxAnimLayer& settings, FbxEuler::EOrder order) {
-    if (rule == LayerRule::rotation && settings.RotationAccumulationMode.Get() == FbxAnimLayer::eRotationByLayer) {
+    if (rule == LayerRule::rotation && settings.RotationAccumulationMode.Get() == FbxAnimLayer::eRotationByLayer)
         return eulerOf(slerp(quaternionOf(below, order), quaternionOf(layer, order), weight), order);
-    }
     Components mix{};
     const bool multiplies =
         rule == LayerRule::scaling && settings.ScaleAccumulationMode.Get() == FbxAnimLayer::eScaleMultiply;

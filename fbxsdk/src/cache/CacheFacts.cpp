@@ -43,10 +43,9 @@ constexpr std::size_t kMaxHeaderBytes = 32;
 /// The byte offset of the first number that is NaN or infinite.
 template <class Number>
 std::optional<std::size_t> firstNotFinite(std::span<const char> bytes, bool swap) {
-    for (std::size_t at = 0; at + sizeof(Number) <= bytes.size(); at += sizeof(Number)) {
+    for (std::size_t at = 0; at + sizeof(Number) <= bytes.size(); at += sizeof(Number))
         if (!std::isfinite(detail::loadNumber<Number>(bytes.data() + at, swap)))
             return at;
-    }
     return {};
 }
 
@@ -84,12 +83,11 @@ public:
         mFacts.wide = mDescription.wide;
         takeChannels();
         const std::string base = detail::mayaCacheBase(descriptionFile);
-        if (mDescription.oneFile) {
+        if (mDescription.oneFile)
             readFile(base + mDescription.dataExtension(), {});
-        } else {
+        else
             for (const auto& [ticks, file] : detail::mayaFrameFiles(base, mDescription))
                 readFile(file, ticks);
-        }
         finish();
         const auto times = sampleTimes();
         for (const detail::MayaCacheChannel& channel : mDescription.channels) {

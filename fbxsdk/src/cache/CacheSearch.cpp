@@ -51,9 +51,8 @@ std::vector<std::string> cacheFileCandidates(const std::string& fbxFile, const s
             const std::string file = fileNameOf(name);
             const std::string lastFolder = lastFolderOf(name);
             add(in(folder, stem + "_fpc", file));
-            if (!lastFolder.empty() && lastFolder != "..") {
+            if (!lastFolder.empty() && lastFolder != "..")
                 add(in(folder, lastFolder, file));
-            }
             add(in(folder, file));
         }
     } else {

@@ -174,11 +174,10 @@ bool FbxCache::OpenFileForRead(FbxStatus* pStatus) {
         auto file = std::make_unique<detail::CacheFile>();
         FbxStatus status;
         detail::faultToStatus(status, [&] {
-            if (format == eMayaCache) {
+            if (format == eMayaCache)
                 file->mayaReader = detail::MayaCacheReader::open(place, status);
-            } else {
+            else
                 file->pointReader = detail::PointCacheReader::open(place, status);
-            }
             return true;
         });
         if (file->mayaReader || file->pointReader) {
@@ -246,32 +245,28 @@ int FbxCache::GetChannelCount(FbxStatus* pStatus) {
 }
 
 bool FbxCache::GetChannelName(int pChannelIndex, FbxString& pChannelName, FbxStatus* pStatus) {
-    if (pChannelIndex < 0 || pChannelIndex >= GetChannelCount(pStatus)) {
+    if (pChannelIndex < 0 || pChannelIndex >= GetChannelCount(pStatus))
         return Outcome(pStatus).fail(FbxStatus::eIndexOutOfRange, "there is no channel with that index");
-    }
     pChannelName = mFile->description()->channels[static_cast<std::size_t>(pChannelIndex)].name.c_str();
     return true;
 }
 
 bool FbxCache::GetChannelDataType(int pChannelIndex, EMCDataType& pChannelType, FbxStatus* pStatus) {
-    if (pChannelIndex < 0 || pChannelIndex >= GetChannelCount(pStatus)) {
+    if (pChannelIndex < 0 || pChannelIndex >= GetChannelCount(pStatus))
         return Outcome(pStatus).fail(FbxStatus::eIndexOutOfRange, "there is no channel with that index");
-    }
     const std::string& type = mFile->description()->channels[static_cast<std::size_t>(pChannelIndex)].type;
     pChannelType = eUnknownData;
-    for (const auto& row : detail::kDataTypes) {
+    for (const auto& row : detail::kDataTypes)
         if (type == row.name)
             pChannelType = row.type;
-    }
     return true;
 }
 
 int FbxCache::GetChannelIndex(const char* pChannelName, FbxStatus* pStatus) {
     const int count = GetChannelCount(pStatus);
-    for (int i = 0; pChannelName && i < count; ++i) {
+    for (int i = 0; pChannelName && i < count; ++i)
         if (mFile->description()->channels[static_cast<std::size_t>(i)].name == pChannelName)
             return i;
-    }
     return -1;
 }
 
@@ -310,10 +305,9 @@ bool FbxCache::AddChannel(const char* pChannelName, EMCDataType pMCDataType, con
     channel.name = pChannelName ? pChannelName : "";
     channel.interpretation = pInterpretation ? pInterpretation : "";
     channel.samplingRate = description.ticksPerFrame;
-    for (const auto& row : detail::kDataTypes) {
+    for (const auto& row : detail::kDataTypes)
         if (row.type == pMCDataType)
             channel.type = row.name;
-    }
     pChannelIndex = static_cast<unsigned int>(description.channels.size());
     description.channels.push_back(std::move(channel));
     return true;
@@ -324,9 +318,8 @@ bool FbxCache::Read(int pChannelIndex, FbxTime& pTime, double* pBuffer, unsigned
     if (!mFile || !mFile->mayaReader)
         return outcome.fail(FbxStatus::eFailure, detail::kNotMaya);
     const auto& channels = mFile->mayaReader->description().channels;
-    if (pChannelIndex < 0 || static_cast<std::size_t>(pChannelIndex) >= channels.size() || !pBuffer) {
+    if (pChannelIndex < 0 || static_cast<std::size_t>(pChannelIndex) >= channels.size() || !pBuffer)
         return outcome.fail(FbxStatus::eIndexOutOfRange, "there is no channel with that index");
-    }
     const std::string& channel = channels[static_cast<std::size_t>(pChannelIndex)].name;
     return detail::faultToStatus(outcome.status, [&] {
         return mFile->mayaReader->read(channel, pTime.GetSecondDouble(), {pBuffer, std::size_t{pPointCount} * 3},
@@ -378,9 +371,8 @@ bool FbxCache::GetAnimationRange(int pChannelIndex, FbxTime& pTimeStart, FbxTime
     if (!mFile || !mFile->mayaReader)
         return outcome.fail(FbxStatus::eFailure, detail::kNotMaya);
     const auto& channels = mFile->mayaReader->description().channels;
-    if (pChannelIndex < 0 || static_cast<std::size_t>(pChannelIndex) >= channels.size()) {
+    if (pChannelIndex < 0 || static_cast<std::size_t>(pChannelIndex) >= channels.size())
         return outcome.fail(FbxStatus::eIndexOutOfRange, "there is no channel with that index");
-    }
     if (!mFile->mayaReader->sampleRange(first, last))
         return outcome.fail(FbxStatus::eFailure, "no samples");
     pTimeStart.SetSecondDouble(static_cast<double>(first) / detail::kMayaTicksPerSecond);
@@ -393,9 +385,8 @@ bool FbxCache::OpenFileForWrite(double pFrameStartOffset, double, unsigned int p
     Outcome outcome(pStatus);
     if (mFile)
         return outcome.fail(FbxStatus::eFailure, "the cache is already open");
-    if (GetCacheFileFormat() != eMaxPointCacheV2) {
+    if (GetCacheFileFormat() != eMaxPointCacheV2)
         return outcome.fail(FbxStatus::eFailure, "the cache is not a Max point cache");
-    }
     // The header's rate is frames per sample, whatever the frames per second are: one sample for every frame.
     const detail::PointCacheHeader header{pPointCount, pFrameStartOffset, 1.0, pSampleCount};
     auto file = std::make_unique<detail::CacheFile>();

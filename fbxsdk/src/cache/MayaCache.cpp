@@ -111,17 +111,15 @@ std::unique_ptr<MayaCacheReader> MayaCacheReader::open(const std::string& descri
     if (!readMayaCacheDescription(descriptionFile, reader->mDescription, status))
         return nullptr;
     const std::string base = mayaCacheBase(descriptionFile);
-    if (reader->mDescription.oneFile) {
+    if (reader->mDescription.oneFile)
         reader->openOneFile(base, status);
-    } else {
+    else
         for (auto& [ticks, file] : mayaFrameFiles(base, reader->mDescription))
             reader->mSamples.try_emplace(ticks, Sample{std::move(file), {}});
-    }
     if (!reader->mSamples.empty())
         return reader;
-    if (!status.Error()) {
+    if (!status.Error())
         status.SetCode(FbxStatus::eInvalidFile, "%s: no samples in its data files", descriptionFile.c_str());
-    }
     return nullptr;
 }
 
@@ -244,11 +242,10 @@ const char* MayaCacheWriter::faultOf(const MayaCacheChannel& channel, double sec
 }
 
 bool MayaCacheWriter::failed(FbxStatus& status) const {
-    if (mFault) {
+    if (mFault)
         status.SetCode(FbxStatus::eFailure, "%s: cannot be written: %s", mDataFile.c_str(), mFault);
-    } else if (mData.failed()) {
+    else if (mData.failed())
         mData.report(status);
-    }
     return mFault || mData.failed();
 }
 

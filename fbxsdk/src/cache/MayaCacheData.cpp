@@ -151,13 +151,11 @@ std::string group(const Layout& layout, std::string_view type, std::string_view 
 std::string blockBytes(const MayaCacheWriteBlock& block) {
     std::string bytes;
     bytes.reserve(block.values.size() * (block.doubles ? 8 : 4));
-    for (const double value : block.values) {
-        if (block.doubles) {
+    for (const double value : block.values)
+        if (block.doubles)
             appendBig(bytes, std::bit_cast<std::uint64_t>(value), 8);
-        } else {
+        else
             appendBig(bytes, std::bit_cast<std::uint32_t>(static_cast<float>(value)), 4);
-        }
-    }
     return bytes;
 }
 

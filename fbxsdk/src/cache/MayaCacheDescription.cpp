@@ -122,10 +122,9 @@ bool readMayaCacheDescription(const std::string& fileName, MayaCacheDescription&
     description.ticksPerFrame =
         std::max(toTicks(root.child("cacheTimePerFrame").attribute("TimePerFrame").as_string(), 250), 1);
     readRange(root.child("time").attribute("Range").as_string(), description);
-    for (const pugi::xml_node& node : root.child("Channels").children()) {
+    for (const pugi::xml_node& node : root.child("Channels").children())
         if (isChannelTag(node.name()))
             description.channels.push_back(readChannel(node, description));
-    }
     return true;
 }
 

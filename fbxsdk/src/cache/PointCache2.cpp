@@ -135,11 +135,10 @@ std::unique_ptr<PointCacheWriter> PointCacheWriter::open(const std::string& file
 }
 
 bool PointCacheWriter::failed(FbxStatus& status) const {
-    if (mFault) {
+    if (mFault)
         status.SetCode(FbxStatus::eFailure, "%s: cannot be written: %s", mFileName.c_str(), mFault);
-    } else if (mFile.failed()) {
+    else if (mFile.failed())
         mFile.report(status);
-    }
     return mFault || mFile.failed();
 }
 
@@ -170,11 +169,10 @@ void PointCacheWriter::put(std::uint64_t offset, std::span<const double> points)
             storeNumber(bytes.data() + i * sizeof(float), static_cast<float>(piece[i]));
         const std::span<const char> stored(bytes.data(), piece.size() * sizeof(float));
         // A sample is either completely beyond the end of the file so far or completely before it.
-        if (offset < mFile.size()) {
+        if (offset < mFile.size())
             mFile.overwrite(offset, stored);
-        } else {
+        else
             mFile.write(stored);
-        }
         offset += stored.size();
         points = points.subspan(piece.size());
     }

@@ -32,9 +32,8 @@ std::uint32_t versionOfComment(std::string_view comment) {
     };
     comment.remove_prefix(1);
     skipSpaces();
-    if (!comment.starts_with("FBX")) {
+    if (!comment.starts_with("FBX"))
         return 0;
-    }
     comment.remove_prefix(3);
     skipSpaces();
     const bool isVersion = digit(0) && digit(2) && digit(4) && comment[1] == '.' && comment[3] == '.' && !digit(5);
@@ -48,9 +47,8 @@ AsciiPreamble readPreamble(std::span<const char> bytes) {
     const char* text = bytes.data();
     const char* const end = text + bytes.size();
     AsciiPreamble preamble;
-    if (std::string_view(text, bytes.size()).starts_with(kByteOrderMark)) {
+    if (std::string_view(text, bytes.size()).starts_with(kByteOrderMark))
         text += kByteOrderMark.size();
-    }
     while (text != end) {
         if (chars::is(chars::blank, *text)) {
             ++text;
@@ -73,9 +71,8 @@ AsciiPreamble readPreamble(std::span<const char> bytes) {
 bool isAscii(std::span<const char> bytes) {
     const char* const end = bytes.data() + bytes.size();
     const AsciiPreamble preamble = readPreamble(bytes);
-    if (preamble.version != 0) {
+    if (preamble.version != 0)
         return true;
-    }
     const char* const nameEnd = tokenEnd(preamble.end, end);
     const char* const colon = skipBlanks(nameEnd, end);
     const std::string_view name(preamble.end, static_cast<std::size_t>(nameEnd - preamble.end));

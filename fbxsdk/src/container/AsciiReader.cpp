@@ -54,9 +54,8 @@ std::string decodeEntities(std::string_view text) {
 /// Where the text ends: disks and tools fill the rest of a block with zeros.
 const char* endOfText(std::span<const char> bytes) {
     const char* end = bytes.data() + bytes.size();
-    while (end != bytes.data() && end[-1] == '\0') {
+    while (end != bytes.data() && end[-1] == '\0')
         --end;
-    }
     return end;
 }
 
@@ -120,9 +119,8 @@ private:
 };
 
 bool AsciiReader::failUnexpected(const char* place, const std::string& expected) {
-    if (place == mEnd) {
+    if (place == mEnd)
         return fail(place, "the file ends where " + expected + " is expected");
-    }
     constexpr std::ptrdiff_t kShown = 40;
     const char* const end = std::max(tokenEnd(place, mEnd), place + 1);
     const std::string token(place, std::min(end, place + kShown));
@@ -138,9 +136,8 @@ bool AsciiReader::refuseZeros(std::string_view token) {
 
 /// The end of the quoted text or the token that comes next; null for a text without a closing quote.
 const char* AsciiReader::itemEnd() const {
-    if (!nextIs('"')) {
+    if (!nextIs('"'))
         return tokenEnd(mNext, mEnd);
-    }
     const char* const quote = findByte(mNext + 1, mEnd, '"');
     return quote != mEnd ? quote + 1 : nullptr;
 }
@@ -148,9 +145,8 @@ const char* AsciiReader::itemEnd() const {
 /// The colon behind what comes next and ends there: a record starts, where a value could follow otherwise. Null when
 /// there is none.
 const char* AsciiReader::nameColon(const char* end) const {
-    if (end == nullptr || end == mNext) {
+    if (end == nullptr || end == mNext)
         return nullptr;
-    }
     const char* const colon = skipBlanks(end, mEnd);
     return colon != mEnd && *colon == ':' ? colon : nullptr;
 }
@@ -163,13 +159,11 @@ std::string_view AsciiReader::readToken() {
 
 /// The text that ends there, behind its closing quote.
 bool AsciiReader::readQuoted(const char* end, std::string_view& text) {
-    if (end == nullptr) {
+    if (end == nullptr)
         return fail(mNext, "a string has no closing quote");
-    }
     text = {mNext + 1, end - 1};
-    if (text.find('&') != std::string_view::npos) {
+    if (text.find('&') != std::string_view::npos)
         text = mTree.keepText(decodeEntities(text));
-    }
     mNext = end;
     return true;
 }
@@ -214,14 +208,12 @@ Record& AsciiReader::appendRecord(std::string_view name) {
 bool AsciiReader::readRecord() {
     const char* const start = mNext;
     std::string_view name;
-    if (!readName(name)) {
+    if (!readName(name))
         return false;
-    }
     Record& record = appendRecord(name);
     record.location = static_cast<std::uint64_t>(start - mStart);
-    if (!readValues(record)) {
+    if (!readValues(record))
         return false;
-    }
     noteVersion(record);
     mNext = skipBlanks(mNext, mEnd);
     return !nextIs('{') || openBlock(record);
@@ -231,26 +223,22 @@ bool AsciiReader::readRecord() {
 bool AsciiReader::readName(std::string_view& name) {
     const char* const end = itemEnd();
     const bool quoted = nextIs('"');
-    if (!quoted && !refuseZeros({mNext, end})) {
+    if (!quoted && !refuseZeros({mNext, end}))
         return false;
-    }
     const char* const colon = nameColon(end);
-    if (colon == nullptr) {
+    if (colon == nullptr)
         return failUnexpected(mNext, "a name with a colon");
-    }
-    if (!quoted) {
+    if (!quoted)
         name = {mNext, end};
-    } else if (!readQuoted(end, name)) {
+    else if (!readQuoted(end, name))
         return false;
-    }
     mNext = colon + 1;
     return true;
 }
 
 bool AsciiReader::openBlock(Record& record) {
-    if (mOpen.size() > kMaxDepth) {
+    if (mOpen.size() > kMaxDepth)
         return fail(mNext, "records are nested deeper than " + std::to_string(kMaxDepth) + " levels");
-    }
     record.hasBlock = true;
     mOpen.push_back({&record, nullptr});
     ++mNext;
@@ -267,24 +255,20 @@ void AsciiReader::noteVersion(const Record& record) {
 
 bool AsciiReader::readValues(Record& record) {
     mNext = skipSeparators(mNext, mEnd);
-    if (readNumberList(record)) {
+    if (readNumberList(record))
         return true;
-    }
     mValues.clear();
     while (mNext != mEnd && !nextIs('{') && !nextIs('}')) {
         const char* const end = itemEnd();
-        if (nameColon(end) != nullptr) {
+        if (nameColon(end) != nullptr)
             break;
-        }
         Value value;
-        if (!readValue(record, end, value)) {
+        if (!readValue(record, end, value))
             return false;
-        }
         mValues.push_back(value);
         mNext = skipBlanks(mNext, mEnd);
-        if (!nextIs(',')) {
+        if (!nextIs(','))
             break;
-        }
         mNext = skipSeparators(mNext, mEnd);
     }
     keepValues(record);
@@ -294,13 +278,11 @@ bool AsciiReader::readValues(Record& record) {
 /// Takes the values as one array if they are many and all numbers. Otherwise leaves them to be read singly.
 bool AsciiReader::readNumberList(Record& record) {
     const char* const start = mNext;
-    if (start == mEnd || *start == '"' || *start == '*') {
+    if (start == mEnd || *start == '"' || *start == '*')
         return false;
-    }
     const NumberRun run = scanNumbers(start, mEnd, /*wordsCount*/ false);
-    if (run.count < kShortestList) {
+    if (run.count < kShortestList)
         return false;
-    }
     mNext = run.next;
     if (run.afterComma && mNext != mEnd && !nextIs('{') && !nextIs('}') && nameColon(itemEnd()) == nullptr) {
         mNext = start;
@@ -313,16 +295,13 @@ bool AsciiReader::readNumberList(Record& record) {
 
 /// The value that ends there, unless it is an array.
 bool AsciiReader::readValue(const Record& record, const char* end, Value& value) {
-    if (nextIs('*')) {
+    if (nextIs('*'))
         return readArray(record, value);
-    }
-    if (!nextIs('"')) {
+    if (!nextIs('"'))
         return readBareValue(end, value);
-    }
     std::string_view text;
-    if (!readQuoted(end, text)) {
+    if (!readQuoted(end, text))
         return false;
-    }
     value = Value::ofText(text);
     return true;
 }
@@ -330,12 +309,10 @@ bool AsciiReader::readValue(const Record& record, const char* end, Value& value)
 bool AsciiReader::readBareValue(const char* end, Value& value) {
     const char* const start = mNext;
     const std::string_view token(start, end);
-    if (token.empty()) {
+    if (token.empty())
         return failUnexpected(start, "a value");
-    }
-    if (!refuseZeros(token)) {
+    if (!refuseZeros(token))
         return false;
-    }
     mNext = end;
     if (const std::optional<std::int64_t> integer = parseInteger(token)) {
         value = Value::ofInteger(*integer);
@@ -345,13 +322,11 @@ bool AsciiReader::readBareValue(const char* end, Value& value) {
         value = Value::ofReal(*real);
         return true;
     }
-    if (chars::is(chars::digit, token.front()) || std::string_view("+-.").find(token.front()) != token.npos) {
+    if (chars::is(chars::digit, token.front()) || std::string_view("+-.").find(token.front()) != token.npos)
         return failUnexpected(start, "a number");
-    }
     // A word behind a text is a name that lost its quotes; its end cannot be determined.
-    if (token.size() > 1 && !mValues.empty() && mValues.back().type == Value::Type::text) {
+    if (token.size() > 1 && !mValues.empty() && mValues.back().type == Value::Type::text)
         return failUnexpected(start, "a quoted string");
-    }
     value = Value::ofWord(token);
     return true;
 }
@@ -363,23 +338,20 @@ bool AsciiReader::readArray(const Record& record, Value& value) {
     const std::string_view count = readToken();
     mNext = skipBlanks(mNext, mEnd);
     if (count.empty() || skipDigits(count.data(), count.data() + count.size()) != count.data() + count.size() ||
-        !nextIs('{')) {
+        !nextIs('{'))
         return failUnexpected(mNext, "a count and '{'");
-    }
     mNext = skipBlanks(mNext + 1, mEnd);
     if (!nextIs('}')) {
         const char* const colon = nameColon(itemEnd());
-        if (colon == nullptr || std::string_view(mNext, tokenEnd(mNext, mEnd)) != "a") {
+        if (colon == nullptr || std::string_view(mNext, tokenEnd(mNext, mEnd)) != "a")
             return failUnexpected(mNext, "'a:'");
-        }
         mNext = skipSeparators(colon + 1, mEnd);
     }
     const char* const start = mNext;
     const NumberRun run = scanNumbers(start, mEnd, /*wordsCount*/ true);
     mNext = run.next;
-    if (!nextIs('}')) {
+    if (!nextIs('}'))
         return failUnexpected(mNext, "a number or '}'");
-    }
     ++mNext;
     if (const auto stated = static_cast<std::uint64_t>(parseInteger(count).value_or(kMostNumbers));
         run.count > stated) {

@@ -30,12 +30,10 @@ void appendBase64(std::string& text, std::span<const char> bytes) {
     for (std::size_t i = 0; i < bytes.size(); i += 3) {
         const std::size_t count = std::min<std::size_t>(3, bytes.size() - i);
         std::uint32_t bits = 0;
-        for (std::size_t j = 0; j < 3; ++j) {
+        for (std::size_t j = 0; j < 3; ++j)
             bits = bits << 8U | (j < count ? static_cast<unsigned char>(bytes[i + j]) : 0U);
-        }
-        for (std::size_t j = 0; j < 4; ++j) {
+        for (std::size_t j = 0; j < 4; ++j)
             text += j <= count ? kDigits[bits >> (18U - 6U * j) & 63U] : '=';
-        }
     }
 }
 
@@ -44,9 +42,8 @@ void appendBase64(std::string& text, std::span<const char> bytes) {
 AsciiSink::AsciiSink(ByteOutput& output, std::uint32_t version) : mOutput(output), mVersion(version) {
     const std::uint32_t digits[] = {version / 1000, version / 100 % 10, version / 10 % 10};
     mText = "; FBX ";
-    for (const std::uint32_t digit : digits) {
+    for (const std::uint32_t digit : digits)
         mText += std::to_string(digit) + '.';
-    }
     mText.back() = ' ';
     mText += "project file\n; ----------------------------------------------------\n\n";
     mLineStart = mText.size();
@@ -61,9 +58,8 @@ void AsciiSink::endLine() {
 }
 
 void AsciiSink::flushWhenLong() {
-    if (mText.size() < kFlushBytes) {
+    if (mText.size() < kFlushBytes)
         return;
-    }
     mOutput.write(mText);
     mText.clear();
     mLineStart = 0;
@@ -97,26 +93,23 @@ void AsciiSink::endRecord() {
 
 void AsciiSink::separate(bool beforeText) {
     assert(!mOpen.empty() && !mOpen.back().hasBlock);
-    if (mOpen.back().valueCount++ == 0) {
+    if (mOpen.back().valueCount++ == 0)
         return;
-    }
     if (mVersion < kFirstVersionWithArrays && mText.size() - mLineStart > kListLine) {
         flushWhenLong();
         mLineStart = mText.size() + 1;
         mText += kListContinuation;
     }
     mText += ',';
-    if (beforeText) {
+    if (beforeText)
         mText += ' ';
-    }
 }
 
 template <class Number>
 void AsciiSink::append(Number value) {
     if constexpr (std::is_floating_point_v<Number>) {
-        if (!std::isfinite(value)) {
+        if (!std::isfinite(value))
             value = 0;
-        }
     }
     char digits[32];
     const auto result = std::to_chars(std::begin(digits), std::end(digits), value);
@@ -145,11 +138,10 @@ void AsciiSink::appendEscaped(std::string_view text) {
     for (const char c : text) {
         const auto* const row = std::find_if(std::begin(kEntities), std::end(kEntities),
                                              [c](const auto& each) { return each.character == c; });
-        if (row != std::end(kEntities)) {
+        if (row != std::end(kEntities))
             mText += row->spelling;
-        } else {
+        else
             mText += c;
-        }
     }
 }
 
@@ -180,9 +172,8 @@ void AsciiSink::objectName(std::string_view className, std::string_view name) {
 template <class Number>
 void AsciiSink::arrayOf(std::span<const Number> values) {
     if (mVersion < kFirstVersionWithArrays) {
-        for (const Number value : values) {
+        for (const Number value : values)
             number(value);
-        }
         return;
     }
     separate(/*beforeText*/ false);
@@ -193,9 +184,8 @@ void AsciiSink::arrayOf(std::span<const Number> values) {
     for (std::size_t i = 0; i < values.size(); ++i) {
         if (i > 0) {
             mText += ',';
-            if (mText.size() - mLineStart > kArrayLine) {
+            if (mText.size() - mLineStart > kArrayLine)
                 endLine();
-            }
         }
         append(values[i]);
     }

@@ -58,11 +58,9 @@ constexpr ElementCode kListCodes[] = {
 
 template <std::size_t size>
 const ElementCode* findCode(const ElementCode (&table)[size], char code) {
-    for (const ElementCode& row : table) {
-        if (row.code == code) {
+    for (const ElementCode& row : table)
+        if (row.code == code)
             return &row;
-        }
-    }
     return nullptr;
 }
 
@@ -142,9 +140,8 @@ private:
 };
 
 bool BinaryReader::readHeader() {
-    if (mBytes.size() < kHeaderSize) {
+    if (mBytes.size() < kHeaderSize)
         return fail(mBytes.size(), "the file ends within its header");
-    }
     mTree.bigEndian = numberAt<std::uint8_t>(kByteOrderOffset) != 0;
     mSwap = needsSwap(mTree.bigEndian);
     mTree.version = numberAt<std::uint32_t>(kVersionOffset);
@@ -168,14 +165,12 @@ bool BinaryReader::readRecords() {
         }
         const std::size_t start = mOffset;
         Head head;
-        if (!readHead(head)) {
+        if (!readHead(head))
             return false;
-        }
-        if (head.isNull()) {
+        if (head.isNull())
             closeBlock();
-        } else if (!readRecord(head, start)) {
+        else if (!readRecord(head, start))
             return false;
-        }
     }
     return true;
 }
@@ -187,16 +182,14 @@ void BinaryReader::closeBlock() {
 
 bool BinaryReader::readHead(Head& head) {
     const std::size_t size = mWide ? 3 * sizeof(std::uint64_t) + 1 : 3 * sizeof(std::uint32_t) + 1;
-    if (mOpen.back().end - mOffset < size) {
+    if (mOpen.back().end - mOffset < size)
         return fail(mOffset, "record header exceeds " + std::string(mOpen.size() > 1 ? "its block" : "the file"));
-    }
     mAhead.need(mOffset, size);
     const char* const bytes = mBytes.data() + mOffset;
-    if (mWide) {
+    if (mWide)
         loadFields<std::uint64_t>(head, bytes);
-    } else {
+    else
         loadFields<std::uint32_t>(head, bytes);
-    }
     mOffset += size;
     return true;
 }
@@ -235,17 +228,14 @@ bool BinaryReader::readRecord(const Head& head, std::size_t start) {
                                "' is outside the range " + std::to_string(valuesEnd) + " to " +
                                std::to_string(blockEnd));
     }
-    if (!readValues(record, head, valuesEnd)) {
+    if (!readValues(record, head, valuesEnd))
         return false;
-    }
     mOffset = valuesEnd;
     record.hasBlock = head.end > valuesEnd;
-    if (!record.hasBlock) {
+    if (!record.hasBlock)
         return true;
-    }
-    if (mOpen.size() > kMaxDepth) {
+    if (mOpen.size() > kMaxDepth)
         return fail(start, "records are nested deeper than " + std::to_string(kMaxDepth) + " levels");
-    }
     mOpen.push_back({&record, nullptr, static_cast<std::size_t>(head.end)});
     return true;
 }
@@ -257,28 +247,23 @@ bool BinaryReader::readValues(Record& record, const Head& head, std::size_t end)
                                  std::to_string(end - mOffset) + " bytes");
     }
     const auto count = static_cast<std::size_t>(head.valueCount);
-    if (readScalarList(record, count, end)) {
+    if (readScalarList(record, count, end))
         return true;
-    }
     const std::span<Value> values = mTree.newValues(count);
     const bool isSmall = end - mOffset <= kMostReadAlong;
-    if (isSmall) {
+    if (isSmall)
         mAhead.need(mOffset, end - mOffset);
-    }
-    for (Value& value : values) {
-        if (!(isSmall && readPlainValue(value, end)) && !readValue(value, end)) {
+    for (Value& value : values)
+        if (!(isSmall && readPlainValue(value, end)) && !readValue(value, end))
             return false;
-        }
-    }
     record.values = values;
     return true;
 }
 
 /// Reads a value of a usual type, whose bytes were fetched. False, with nothing done, for other and faulty ones.
 bool BinaryReader::readPlainValue(Value& value, std::size_t end) {
-    if (mOffset == end) {
+    if (mOffset == end)
         return false;
-    }
     const char* const bytes = mBytes.data() + mOffset + 1;
     const std::size_t left = end - mOffset - 1;
     switch (bytes[-1]) {
@@ -290,13 +275,11 @@ bool BinaryReader::readPlainValue(Value& value, std::size_t end) {
         return readPlainNumber<double>(value, bytes, left);
     case 'S': {
         constexpr std::size_t kSizeBytes = 4;
-        if (left < kSizeBytes) {
+        if (left < kSizeBytes)
             return false;
-        }
         const std::size_t size = loadNumber<std::uint32_t>(bytes, mSwap);
-        if (size > left - kSizeBytes) {
+        if (size > left - kSizeBytes)
             return false;
-        }
         value.type = Value::Type::text;
         value.code = 'S';
         value.text = {bytes + kSizeBytes, size};
@@ -310,9 +293,8 @@ bool BinaryReader::readPlainValue(Value& value, std::size_t end) {
 
 template <class Number>
 bool BinaryReader::readPlainNumber(Value& value, const char* bytes, std::size_t left) {
-    if (left < sizeof(Number)) {
+    if (left < sizeof(Number))
         return false;
-    }
     value.code = bytes[-1];
     if constexpr (std::is_integral_v<Number>) {
         value.type = Value::Type::integer;
@@ -328,24 +310,19 @@ bool BinaryReader::readPlainNumber(Value& value, const char* bytes, std::size_t 
 // Before 7.x there are no arrays: a mesh has a scalar per coordinate. If all have the same type, that is an array with
 // a type code before each element.
 bool BinaryReader::readScalarList(Record& record, std::size_t count, std::size_t end) {
-    if (count < kShortestList) {
+    if (count < kShortestList)
         return false;
-    }
     mAhead.need(mOffset, 1);
     const ElementCode* const code = findCode(kListCodes, mBytes[mOffset]);
-    if (code == nullptr) {
+    if (code == nullptr)
         return false;
-    }
     const std::size_t stride = 1 + elementSize(code->element);
-    if (count > (end - mOffset) / stride) {
+    if (count > (end - mOffset) / stride)
         return false;
-    }
     mAhead.need(mOffset, count * stride);
-    for (std::size_t i = 0; i < count; ++i) {
-        if (mBytes[mOffset + i * stride] != code->code) {
+    for (std::size_t i = 0; i < count; ++i)
+        if (mBytes[mOffset + i * stride] != code->code)
             return false;
-        }
-    }
     StoredArray& array = mTree.newArray();
     array.element = code->element;
     array.bigEndian = mTree.bigEndian;
@@ -360,9 +337,8 @@ bool BinaryReader::readScalarList(Record& record, std::size_t count, std::size_t
 }
 
 bool BinaryReader::readValue(Value& value, std::size_t end) {
-    if (mOffset == end) {
+    if (mOffset == end)
         return fail(mOffset, "the record has fewer values than its header states");
-    }
     mAhead.need(mOffset, 1);
     const char code = mBytes[mOffset++];
     const bool read = readValueOf(code, value, end);
@@ -394,44 +370,38 @@ bool BinaryReader::readValueOf(char code, Value& value, std::size_t end) {
     default:
         break;
     }
-    if (const ElementCode* const array = findCode(kArrayCodes, code)) {
+    if (const ElementCode* const array = findCode(kArrayCodes, code))
         return readArray(value, array->element, end);
-    }
     return fail(mOffset - 1, "unknown value type " + std::to_string(static_cast<unsigned char>(code)));
 }
 
 template <class Number>
 bool BinaryReader::readScalar(Value& value, std::size_t end) {
-    if (end - mOffset < sizeof(Number)) {
+    if (end - mOffset < sizeof(Number))
         return fail(mOffset, "a number exceeds its record");
-    }
     const auto number = numberAt<Number>(mOffset);
-    if constexpr (std::is_integral_v<Number>) {
+    if constexpr (std::is_integral_v<Number>)
         value = Value::ofInteger(number);
-    } else {
+    else
         value = Value::ofReal(static_cast<double>(number));
-    }
     mOffset += sizeof(Number);
     return true;
 }
 
 bool BinaryReader::readLetter(Value& value, std::size_t end) {
-    if (mOffset == end) {
+    if (mOffset == end)
         return fail(mOffset, "a character exceeds its record");
-    }
     value = Value::ofWord(textAt(mOffset++, 1));
     return true;
 }
 
 bool BinaryReader::readText(Value& value, Value::Type type, std::size_t end) {
     constexpr std::size_t kSizeBytes = 4;
-    if (end - mOffset < kSizeBytes) {
+    if (end - mOffset < kSizeBytes)
         return fail(mOffset, "the size of a string exceeds its record");
-    }
     const auto size = numberAt<std::uint32_t>(mOffset);
-    if (size > end - mOffset - kSizeBytes) {
+    if (size > end - mOffset - kSizeBytes)
         return fail(mOffset, "string of " + std::to_string(size) + " bytes exceeds its record");
-    }
     mOffset += kSizeBytes;
     if (type == Value::Type::raw && size > kMostReadAlong) {
         StoredArray& array = mTree.newArray();
@@ -450,18 +420,15 @@ bool BinaryReader::readText(Value& value, Value::Type type, std::size_t end) {
 bool BinaryReader::readArray(Value& value, StoredArray::Element element, std::size_t end) {
     constexpr std::size_t kHeadBytes = 12;
     const std::size_t start = mOffset;
-    if (end - start < kHeadBytes) {
+    if (end - start < kHeadBytes)
         return fail(start, "array header exceeds its record");
-    }
     const auto count = numberAt<std::uint32_t>(start);
     const auto encoding = numberAt<std::uint32_t>(start + 4);
     const auto size = numberAt<std::uint32_t>(start + 8);
-    if (size > end - start - kHeadBytes) {
+    if (size > end - start - kHeadBytes)
         return fail(start, "array of " + std::to_string(size) + " bytes exceeds its record");
-    }
-    if (encoding > 1) {
+    if (encoding > 1)
         return fail(start, "unknown array encoding " + std::to_string(encoding));
-    }
     StoredArray& array = mTree.newArray();
     array.element = element;
     array.compressed = encoding == 1;
@@ -475,11 +442,10 @@ bool BinaryReader::readArray(Value& value, StoredArray::Element element, std::si
 
 void BinaryReader::keepPayload(StoredArray& array, std::size_t size) {
     array.bytes = mBytes.subspan(mOffset, size);
-    if (size > kMostReadAlong) {
+    if (size > kMostReadAlong)
         array.file = mTree.file.get();
-    } else {
+    else
         mAhead.need(mOffset, size);
-    }
     mOffset += size;
 }
 
@@ -491,9 +457,8 @@ bool BinaryReader::checkArray(const StoredArray& array, std::size_t offset) {
         return fail(offset, "array of " + std::to_string(array.count) + " elements does not match its " +
                                 std::to_string(array.bytes.size()) + " bytes");
     }
-    if (array.compressed) {
+    if (array.compressed)
         mExpanded += array.count * sizeof(double);
-    }
     if (mExpanded > kMaxExpansion * mBytes.size() + kFreeExpansion) {
         return fail(offset,
                     "the arrays expand to more than " + std::to_string(kMaxExpansion) + " times the size of the file");

@@ -33,9 +33,8 @@ constexpr std::uint64_t kMaxValueBytes = std::numeric_limits<std::uint32_t>::max
 template <class Number>
 void storeNumber(char* bytes, Number number) {
     auto bits = std::bit_cast<BitsOf<Number>>(number);
-    if (needsSwap(/*bigEndian*/ false)) {
+    if (needsSwap(/*bigEndian*/ false))
         bits = swapBytes(bits);
-    }
     std::memcpy(bytes, &bits, sizeof bits);
 }
 
@@ -48,13 +47,11 @@ std::span<const char> bytesOf(const FileCode& code) {
 /// Packed elements in the file's byte order: the memory itself wherever that is the machine's order.
 template <class Number>
 std::span<const char> fileBytes(std::span<const Number> values, std::vector<char>& swapped) {
-    if (!needsSwap(/*bigEndian*/ false)) {
+    if (!needsSwap(/*bigEndian*/ false))
         return {reinterpret_cast<const char*>(values.data()), values.size_bytes()};
-    }
     swapped.resize(values.size_bytes());
-    for (std::size_t i = 0; i < values.size(); ++i) {
+    for (std::size_t i = 0; i < values.size(); ++i)
         storeNumber(swapped.data() + i * sizeof(Number), values[i]);
-    }
     return swapped;
 }
 
@@ -75,9 +72,8 @@ BinarySink::BinarySink(ByteOutput& output, const BinarySink& whole)
 std::size_t BinarySink::headSize() const { return mWide ? 25 : 13; }
 
 void BinarySink::setFault(const std::string& fault) {
-    if (mFault.empty()) {
+    if (mFault.empty())
         mFault = fault;
-    }
 }
 
 void BinarySink::writeZeros(std::size_t count) {
@@ -108,15 +104,13 @@ void BinarySink::endRecord() {
     assert(!mOpen.empty());
     OpenRecord record = mOpen.back();
     mOpen.pop_back();
-    if (record.hasBlock) {
+    if (record.hasBlock)
         writeZeros(headSize());
-    } else {
+    else
         record.valuesEnd = mOutput.size();
-    }
     checkSize();
-    if (!failed()) {
+    if (!failed())
         patchHead(record);
-    }
 }
 
 void BinarySink::checkSize() {
@@ -131,13 +125,11 @@ void BinarySink::patchHead(const OpenRecord& record) {
     const std::uint64_t fields[] = {mOutput.size(), record.valueCount, record.valuesEnd - record.valuesStart};
     char head[3 * sizeof(std::uint64_t)];
     std::size_t size = 0;
-    for (const std::uint64_t field : fields) {
+    for (const std::uint64_t field : fields)
         size += storeOffset(head + size, field);
-    }
     mOutput.overwrite(record.start, std::span(head, size));
-    if (mIsFragment) {
+    if (mIsFragment)
         mHeads.push_back(record.start);
-    }
 }
 
 /// Size in bytes of an offset or a count in heads.
@@ -161,9 +153,8 @@ void BinarySink::parts(std::span<const Part> list) {
     std::vector<MemoryOutput> outputs(list.size());
     std::vector<std::unique_ptr<BinarySink>> fragments;
     fragments.reserve(list.size());
-    for (MemoryOutput& output : outputs) {
+    for (MemoryOutput& output : outputs)
         fragments.emplace_back(new BinarySink(output, *this));
-    }
     forEachInParallel(list.size(), [&](std::size_t i) { list[i](*fragments[i]); });
     for (std::size_t i = 0; i < list.size(); ++i) {
         append(*fragments[i], outputs[i].takeBytes());
@@ -176,15 +167,13 @@ void BinarySink::append(const BinarySink& fragment, std::string bytes) {
     const std::uint64_t place = mOutput.size();
     for (const std::uint64_t head : fragment.mHeads) {
         char* const end = bytes.data() + head;
-        if (mIsFragment) {
+        if (mIsFragment)
             mHeads.push_back(place + head);
-        }
         storeOffset(end, place + (mWide ? loadNumber<std::uint64_t>(end, swap) : loadNumber<std::uint32_t>(end, swap)));
     }
     mOutput.write(bytes);
-    if (!fragment.mFault.empty()) {
+    if (!fragment.mFault.empty())
         setFault(fragment.mFault);
-    }
     checkSize();
 }
 
@@ -213,9 +202,8 @@ void BinarySink::sizedBytes(char code, std::string_view first, std::string_view 
         return;
     }
     scalar(code, static_cast<std::uint32_t>(size));
-    for (const std::string_view part : {first, second, third}) {
+    for (const std::string_view part : {first, second, third})
         mOutput.write(bytesOf(part));
-    }
 }
 
 void BinarySink::text(std::string_view value) { sizedBytes('S', value); }
@@ -228,11 +216,10 @@ void BinarySink::objectName(std::string_view className, std::string_view name) {
 
 template <class Number>
 void BinarySink::arrayOf(char arrayCode, char scalarCode, std::span<const Number> values) {
-    if (mVersion >= kFirstVersionWithArrays) {
+    if (mVersion >= kFirstVersionWithArrays)
         packedArray(arrayCode, values);
-    } else {
+    else
         scalarList(scalarCode, values);
-    }
 }
 
 template <class Number>
@@ -244,13 +231,11 @@ void BinarySink::packedArray(char code, std::span<const Number> values) {
     std::vector<char> swapped;
     std::span<const char> bytes = fileBytes(values, swapped);
     std::span<const char> stream;
-    if (bytes.size() >= kShortestCompressed) {
+    if (bytes.size() >= kShortestCompressed)
         stream = mDeflater.deflated(bytes);
-    }
     const bool compressed = !stream.empty();
-    if (compressed) {
+    if (compressed)
         bytes = stream;
-    }
     scalar(code, static_cast<std::uint32_t>(values.size()));
     char head[8];
     storeNumber(head, std::uint32_t{compressed});
@@ -261,9 +246,8 @@ void BinarySink::packedArray(char code, std::span<const Number> values) {
 
 template <class Number>
 void BinarySink::scalarList(char code, std::span<const Number> values) {
-    for (const Number value : values) {
+    for (const Number value : values)
         scalar(code, value);
-    }
 }
 
 void BinarySink::array(std::span<const double> values) { arrayOf('d', 'D', values); }
@@ -276,9 +260,8 @@ void BinarySink::array(std::span<const std::uint8_t> values) {
         packedArray('b', values);
         return;
     }
-    for (const std::uint8_t value : values) {
+    for (const std::uint8_t value : values)
         integer(value);
-    }
 }
 
 void BinarySink::floatBits(std::span<const std::uint32_t> words) { arrayOf('f', 'F', words); }

@@ -24,15 +24,14 @@ using BitsOf =
 template <class Bits>
 [[nodiscard]] constexpr Bits swapBytes(Bits bits) {
     static_assert(std::is_unsigned_v<Bits>);
-    if constexpr (sizeof(Bits) == 2) {
+    if constexpr (sizeof(Bits) == 2)
         return __builtin_bswap16(bits);
-    } else if constexpr (sizeof(Bits) == 4) {
+    else if constexpr (sizeof(Bits) == 4)
         return __builtin_bswap32(bits);
-    } else if constexpr (sizeof(Bits) == 8) {
+    else if constexpr (sizeof(Bits) == 8)
         return __builtin_bswap64(bits);
-    } else {
+    else
         return bits;
-    }
 }
 
 /// Whether bytes of that order have to be swapped on this machine.

@@ -38,9 +38,8 @@ public:
     FileDescriptor(const FileDescriptor&) = delete;
     FileDescriptor& operator=(const FileDescriptor&) = delete;
     ~FileDescriptor() {
-        if (mNumber >= 0) {
+        if (mNumber >= 0)
             ::close(mNumber);
-        }
     }
     [[nodiscard]] int number() const { return mNumber; }
     [[nodiscard]] int release() { return std::exchange(mNumber, -1); }
@@ -102,13 +101,12 @@ int waitForBytes(int pipe) {
 int readPipe(int pipe, std::span<char> memory, std::size_t& size) {
     for (size = 0; size < memory.size();) {
         const ssize_t count = ::read(pipe, memory.data() + size, std::min(memory.size() - size, std::size_t{1} << 20));
-        if (count > 0) {
+        if (count > 0)
             size += static_cast<std::size_t>(count);
-        } else if (count == 0) {
+        else if (count == 0)
             return 0;
-        } else if (const int error = errno == EAGAIN ? waitForBytes(pipe) : errno; error != 0 && error != EINTR) {
+        else if (const int error = errno == EAGAIN ? waitForBytes(pipe) : errno; error != 0 && error != EINTR)
             return error;
-        }
     }
     return EFBIG;
 }
@@ -128,16 +126,13 @@ FileBytes::~FileBytes() {
 std::shared_ptr<const FileBytes> FileBytes::open(const std::string& fileName, FbxStatus& status) {
     FileDescriptor file(fileName);
     struct stat facts = {};
-    if (file.number() < 0 || !settledFacts(file.number(), facts)) {
+    if (file.number() < 0 || !settledFacts(file.number(), facts))
         return refuse(fileName, errno, status);
-    }
-    if (S_ISDIR(facts.st_mode)) {
+    if (S_ISDIR(facts.st_mode))
         return refuse(fileName, EISDIR, status);
-    }
     const bool isPipe = S_ISFIFO(facts.st_mode);
-    if (!S_ISREG(facts.st_mode) && !isPipe) {
+    if (!S_ISREG(facts.st_mode) && !isPipe)
         return refuse(fileName, "neither a regular file nor a pipe", status);
-    }
     const std::shared_ptr<FileBytes> opened(new FileBytes); // first, so that nothing can fail after the reservation
     opened->mName = fileName;
     std::size_t size = isPipe ? kMostPipeBytes : static_cast<std::size_t>(facts.st_size);
@@ -206,21 +201,20 @@ void FileBytes::fetch(std::span<const char> part) const {
     const std::span<char> place = mMemory.subspan(static_cast<std::size_t>(part.data() - mMemory.data()), part.size());
     preferLargePages(place);
     allow(place);
-    if (!copyInPieces(part, place.data())) {
+    if (!copyInPieces(part, place.data()))
         copy(part, place.data());
-    }
 }
 
 bool FileBytes::copyInPieces(std::span<const char> part, char* destination) const {
     constexpr std::size_t kPiece = std::size_t{1} << 23;
-    if (part.size() < 2 * kPiece || extensions::maximumThreads() == 1) {
+    if (part.size() < 2 * kPiece || extensions::maximumThreads() == 1)
         return false;
-    }
     try {
-        forEachInParallel((part.size() + kPiece - 1) / kPiece, [&](std::size_t i) {
-            const std::size_t from = i * kPiece;
-            copy(part.subspan(from, std::min(kPiece, part.size() - from)), destination + from);
-        });
+        forEachInParallel((part.size() + kPiece - 1) / kPiece,
+                          [&](std::size_t i) {
+                              const std::size_t from = i * kPiece;
+                              copy(part.subspan(from, std::min(kPiece, part.size() - from)), destination + from);
+                          });
     } catch (const FileFault&) {
         return false; // of several faults nobody knows which was the first one
     }

@@ -37,9 +37,8 @@ FileCode digitsOf(const CreationTime& time) {
     for (const auto& part : kParts) {
         end += static_cast<std::size_t>(part.digits);
         int rest = part.number;
-        for (std::size_t i = 1; i <= static_cast<std::size_t>(part.digits); ++i, rest /= 10) {
+        for (std::size_t i = 1; i <= static_cast<std::size_t>(part.digits); ++i, rest /= 10)
             digits[end - i] = static_cast<std::uint8_t>('0' + rest % 10);
-        }
     }
     return digits;
 }
@@ -69,9 +68,8 @@ CreationTime brokenDown(std::chrono::system_clock::time_point moment, Breakdown 
     const std::time_t seconds = std::chrono::system_clock::to_time_t(whole);
     const auto rest = std::chrono::duration_cast<std::chrono::milliseconds>(moment - whole);
     std::tm parts{};
-    if (breakdown(&seconds, &parts) == nullptr) {
+    if (breakdown(&seconds, &parts) == nullptr)
         return {};
-    }
     // A leap second would need its own digit pair in the codes; files never have one.
     return {std::clamp(parts.tm_year, -1900, 9999 - 1900) + 1900,
             parts.tm_mon + 1,

@@ -28,9 +28,8 @@ int openUnlessUnread(const std::string& path) {
         file = ::open(path.c_str(), O_WRONLY | O_NONBLOCK | O_CLOEXEC);
         struct stat existing {};
         const bool waits = file < 0 && errno == ENXIO && ::stat(path.c_str(), &existing) == 0;
-        if (!waits || !S_ISFIFO(existing.st_mode)) {
+        if (!waits || !S_ISFIFO(existing.st_mode))
             return file;
-        }
         ::nanosleep(&kPause, nullptr);
     }
     errno = ENXIO;
@@ -44,14 +43,12 @@ int transferAll(std::span<Byte> bytes, const Step& step) {
     while (done < bytes.size()) {
         const ssize_t count = step(bytes.subspan(done), done);
         if (count < 0) {
-            if (errno == EINTR) {
+            if (errno == EINTR)
                 continue;
-            }
             return errno;
         }
-        if (count == 0) {
+        if (count == 0)
             return EIO;
-        }
         done += static_cast<std::size_t>(count);
     }
     return 0;
@@ -89,9 +86,8 @@ private:
 int FileOperations::create(const std::string& path, unsigned permissions, int& file) {
     constexpr mode_t kUsual = 0666; // less the process's mask
     file = ::open(path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, kUsual);
-    if (file < 0) {
+    if (file < 0)
         return errno;
-    }
     // Where the file system has no permissions, the file is written all the same.
     if (permissions != 0 && ::fchmod(file, static_cast<mode_t>(permissions)) != 0 && errno != EPERM &&
         errno != ENOTSUP) {
@@ -106,9 +102,8 @@ int FileOperations::create(const std::string& path, unsigned permissions, int& f
 
 int FileOperations::openExisting(const std::string& path, int& file) {
     file = openUnlessUnread(path);
-    if (file < 0) {
+    if (file < 0)
         return errno;
-    }
     const int error = outcome(::fcntl(file, F_SETFL, ::fcntl(file, F_GETFL) & ~O_NONBLOCK));
     if (error != 0) {
         ::close(file);
@@ -123,15 +118,19 @@ int FileOperations::write(int file, std::span<const char> bytes) {
 }
 
 int FileOperations::writeAt(int file, std::uint64_t offset, std::span<const char> bytes) {
-    return transferAll(bytes, [=](auto rest, std::size_t done) {
-        return ::pwrite(file, rest.data(), rest.size(), static_cast<off_t>(offset + done));
-    });
+    return transferAll(
+        bytes,
+        [=](auto rest, std::size_t done) {
+            return ::pwrite(file, rest.data(), rest.size(), static_cast<off_t>(offset + done));
+        });
 }
 
 int FileOperations::readAt(int file, std::uint64_t offset, std::span<char> bytes) {
-    return transferAll(bytes, [=](auto rest, std::size_t done) {
-        return ::pread(file, rest.data(), rest.size(), static_cast<off_t>(offset + done));
-    });
+    return transferAll(
+        bytes,
+        [=](auto rest, std::size_t done) {
+            return ::pread(file, rest.data(), rest.size(), static_cast<off_t>(offset + done));
+        });
 }
 
 int FileOperations::flush(int file) {

@@ -35,9 +35,8 @@ public:
         }
         const char* const end = mText.data() + offset;
         // Lines are long where files are large, so that searching beats counting byte by byte.
-        for (const char* text = mText.data() + mOffset; (text = findByte(text, end, mEnd)) != end; ++text) {
+        for (const char* text = mText.data() + mOffset; (text = findByte(text, end, mEnd)) != end; ++text)
             ++mLine;
-        }
         mOffset = offset;
         return mLine;
     }

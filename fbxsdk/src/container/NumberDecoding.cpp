@@ -36,9 +36,8 @@ template <class Source, class Number>
 void convertElements(const char* source, std::size_t stride, bool swap, std::span<Number> destination) {
     if constexpr (kSameBits<Source, Number>) {
         if (stride == sizeof(Source) && !swap) {
-            if (static_cast<const void*>(source) != destination.data()) {
+            if (static_cast<const void*>(source) != destination.data())
                 std::memcpy(destination.data(), source, destination.size_bytes());
-            }
             return;
         }
         for (Number& number : destination) {
@@ -89,10 +88,8 @@ constexpr StoredArray::Element kElementOf<std::int64_t> = StoredArray::Element::
 /// Elements that a file has in the requested layout are read directly into the destination.
 template <class Number>
 bool readDirectly(const StoredArray& array, std::span<Number> destination) {
-    if (array.file == nullptr || array.element != kElementOf<Number> || array.stride != 0 ||
-        needsSwap(array.bigEndian)) {
+    if (array.file == nullptr || array.element != kElementOf<Number> || array.stride != 0 || needsSwap(array.bigEndian))
         return false;
-    }
     array.file->read(array.bytes.first(destination.size_bytes()),
                      static_cast<char*>(static_cast<void*>(destination.data())));
     return true;
@@ -104,16 +101,14 @@ bool inflateArray(const StoredArray& array, std::span<const char> stream, std::s
     if (destination.size() == array.count && size <= destination.size_bytes()) {
         // The tail of the destination serves as the buffer: widening from front to back never overtakes what it reads.
         char* const tail = static_cast<char*>(static_cast<void*>(destination.data())) + destination.size_bytes() - size;
-        if (!inflateExactly(stream, {tail, size})) {
+        if (!inflateExactly(stream, {tail, size}))
             return false;
-        }
         convertBytes(array, tail, destination);
         return true;
     }
     const auto buffer = std::make_unique_for_overwrite<char[]>(size);
-    if (!inflateExactly(stream, {buffer.get(), size})) {
+    if (!inflateExactly(stream, {buffer.get(), size}))
         return false;
-    }
     convertBytes(array, buffer.get(), destination);
     return true;
 }
@@ -130,21 +125,18 @@ Number parseElement(const char* token, const char* end, bool bitPatterns) {
     const std::string_view text(token, static_cast<std::size_t>(end - token));
     if (bitPatterns && isWhole(token, end)) {
         const auto bits = static_cast<std::uint32_t>(parseInteger(text).value_or(0));
-        if constexpr (std::is_same_v<Number, std::uint32_t>) {
+        if constexpr (std::is_same_v<Number, std::uint32_t>)
             return bits;
-        } else {
+        else
             return convertNumber<Number>(std::bit_cast<float>(bits));
-        }
     }
     if constexpr (std::is_same_v<Number, float> || std::is_same_v<Number, std::uint32_t>) {
         // Not through a double: the nearest float of the nearest double may be the wrong one.
-        if (const std::optional<float> number = parseFloat(text)) {
+        if (const std::optional<float> number = parseFloat(text))
             return convertNumber<Number>(*number);
-        }
     } else if constexpr (std::is_integral_v<Number>) {
-        if (const std::optional<std::int64_t> number = parseInteger(text)) {
+        if (const std::optional<std::int64_t> number = parseInteger(text))
             return convertNumber<Number>(*number);
-        }
     }
     return convertNumber<Number>(parseReal(text).value_or(letterCode(*token)));
 }
@@ -154,9 +146,8 @@ template <class Number>
 const char* parseFast(const char* text, const char* end, Number& number) {
     if constexpr (!std::is_same_v<Number, std::uint32_t>) {
         const auto result = std::from_chars(text, end, number);
-        if (result.ec == std::errc() && (result.ptr == end || chars::is(chars::delimiter, *result.ptr))) {
+        if (result.ec == std::errc() && (result.ptr == end || chars::is(chars::delimiter, *result.ptr)))
             return result.ptr;
-        }
     }
     return nullptr;
 }
@@ -174,9 +165,8 @@ bool parseNumbers(const char* text, const char* end, bool bitPatterns, std::span
         const char* next = bitPatterns ? nullptr : parseFast(text, end, number);
         if (next == nullptr) {
             next = tokenEnd(text, end);
-            if (next == text) {
+            if (next == text)
                 return false;
-            }
             number = parseElement<Number>(text, next, bitPatterns);
         }
         text = nextValue(next, end);
@@ -189,16 +179,14 @@ bool parseText(const StoredArray& array, std::span<Number> destination) {
     const char* const end = array.bytes.data() + array.bytes.size();
     const std::vector<NumberPiece> pieces =
         destination.size() == array.count ? piecesOfRun(array.bytes, array.count) : std::vector<NumberPiece>();
-    if (pieces.empty()) {
+    if (pieces.empty())
         return parseNumbers(array.bytes.data(), end, array.bitPatterns, destination);
-    }
     std::atomic<bool> sound{true};
     forEachInParallel(pieces.size(), [&](std::size_t i) {
         const NumberPiece& piece = pieces[i];
         if (!parseNumbers(skipSeparators(piece.text, end), end, array.bitPatterns,
-                          destination.subspan(piece.first, piece.count))) {
+                          destination.subspan(piece.first, piece.count)))
             sound = false;
-        }
     });
     return sound;
 }
@@ -221,9 +209,8 @@ std::size_t elementSize(StoredArray::Element element) {
 }
 
 std::span<const char> payloadOf(const StoredArray& array, std::unique_ptr<char[]>& memory) {
-    if (array.file == nullptr) {
+    if (array.file == nullptr)
         return array.bytes;
-    }
     memory = std::make_unique_for_overwrite<char[]>(array.bytes.size());
     preferLargePages({memory.get(), array.bytes.size()});
     array.file->read(array.bytes, memory.get());
@@ -232,20 +219,16 @@ std::span<const char> payloadOf(const StoredArray& array, std::unique_ptr<char[]
 
 template <class Number>
 bool decodeArray(const StoredArray& array, std::span<Number> destination) {
-    if (destination.empty()) {
+    if (destination.empty())
         return true;
-    }
-    if (array.element == StoredArray::Element::text) {
+    if (array.element == StoredArray::Element::text)
         return parseText(array, destination);
-    }
-    if (!array.compressed && readDirectly(array, destination)) {
+    if (!array.compressed && readDirectly(array, destination))
         return true;
-    }
     std::unique_ptr<char[]> memory;
     const std::span<const char> payload = payloadOf(array, memory);
-    if (array.compressed) {
+    if (array.compressed)
         return inflateArray(array, payload, destination);
-    }
     convertBytes(array, payload.data(), destination);
     return true;
 }

@@ -23,9 +23,8 @@ namespace {
 /// The end of the number that starts here, the start itself when there is none. Where words count, any word is one.
 const char* numberEnd(const char* text, const char* end, bool wordsCount) {
     const char* const plainEnd = plainNumberEnd(text, end);
-    if (plainEnd != text && (plainEnd == end || chars::is(chars::delimiter, *plainEnd))) {
+    if (plainEnd != text && (plainEnd == end || chars::is(chars::delimiter, *plainEnd)))
         return plainEnd;
-    }
     const char* const after = tokenEnd(text, end);
     const std::string_view token(text, static_cast<std::size_t>(after - text));
     const bool isWord = !token.empty() && chars::is(chars::letter, token.front());
@@ -51,16 +50,14 @@ PartialRun scanUpTo(const char* stop, const char* text, const char* end, bool wo
     while (text < stop) {
         const char* const after = numberEnd(text, end, wordsCount);
         const char* const next = after != end && *after == ',' ? after : skipBlanks(after, end);
-        if (after == text || (next != end && *next == ':')) {
+        if (after == text || (next != end && *next == ':'))
             return {run, false}; // no number, or the name of the next record
-        }
         ++run.count;
         run.numbersEnd = after;
         run.next = next;
         run.afterComma = next != end && *next == ',';
-        if (!run.afterComma) {
+        if (!run.afterComma)
             return {run, false};
-        }
         text = behindComma(next + 1, end);
         run.next = text;
     }
@@ -74,9 +71,8 @@ std::vector<const char*> pieceStarts(const char* text, const char* end) {
     while (starts.size() <= kMostPieces && static_cast<std::size_t>(end - starts.back()) > kPieceBytes) {
         const char* const from = starts.back() + kPieceBytes;
         const void* const comma = std::memchr(from, ',', static_cast<std::size_t>(end - from));
-        if (comma == nullptr) {
+        if (comma == nullptr)
             break;
-        }
         starts.push_back(behindComma(static_cast<const char*>(comma) + 1, end));
     }
     return starts;
@@ -100,9 +96,8 @@ PartialRun scanPieces(const char* text, const char* end, bool wordsCount) {
     std::vector<PartialRun> pieces(starts.size() - 1);
     std::atomic<std::size_t> last{pieces.size()};
     forEachInParallel(pieces.size(), [&](std::size_t i) {
-        if (i > last) {
+        if (i > last)
             return;
-        }
         pieces[i] = scanUpTo(starts[i + 1], starts[i], end, wordsCount);
         if (!pieces[i].goesOn || pieces[i].run.next != starts[i + 1]) {
             for (std::size_t before = last; i < before && !last.compare_exchange_weak(before, i);) {
@@ -110,9 +105,8 @@ PartialRun scanPieces(const char* text, const char* end, bool wordsCount) {
         }
     });
     PartialRun whole{{0, text, text, true}, true};
-    for (std::size_t i = 0; i < pieces.size() && i <= last; ++i) {
+    for (std::size_t i = 0; i < pieces.size() && i <= last; ++i)
         whole.goesOn = append(whole.run, pieces[i]);
-    }
     return whole;
 }
 
@@ -121,9 +115,8 @@ std::uint64_t countCommas(std::span<const char> text) {
     std::uint64_t commas = 0;
     for (; text.size() >= kBlock; text = text.subspan(kBlock)) {
         std::uint8_t inBlock = 0;
-        for (std::size_t i = 0; i < kBlock; ++i) {
+        for (std::size_t i = 0; i < kBlock; ++i)
             inBlock = static_cast<std::uint8_t>(inBlock + (text[i] == ',' ? 1 : 0));
-        }
         commas += inBlock;
     }
     return commas + static_cast<std::uint64_t>(std::count(text.begin(), text.end(), ','));
@@ -147,9 +140,8 @@ NumberRun scanNumbers(const char* text, const char* end, bool wordsCount) {
 }
 
 std::vector<NumberPiece> piecesOfRun(std::span<const char> run, std::uint64_t count) {
-    if (extensions::maximumThreads() == 1 || run.size() < 2 * kPieceBytes) {
+    if (extensions::maximumThreads() == 1 || run.size() < 2 * kPieceBytes)
         return {};
-    }
     std::vector<NumberPiece> pieces;
     const char* const end = run.data() + run.size();
     for (const char* text = run.data(); text != nullptr;) {
@@ -164,9 +156,8 @@ std::vector<NumberPiece> piecesOfRun(std::span<const char> run, std::uint64_t co
     });
     ++pieces.back().count; // behind the last number there is none
     std::uint64_t numbers = 0;
-    for (NumberPiece& piece : pieces) {
+    for (NumberPiece& piece : pieces)
         piece.first = std::exchange(numbers, numbers + piece.count);
-    }
     return numbers == count ? pieces : std::vector<NumberPiece>();
 }
 

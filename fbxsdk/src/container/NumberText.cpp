@@ -20,16 +20,16 @@ bool isSign(char c) { return c == '+' || c == '-'; }
 bool isLetterOrDigit(char c) { return chars::is(chars::digit, c) || chars::is(chars::letter, c) || c == '_'; }
 
 bool allDigits(std::string_view text) {
-    return std::all_of(text.begin(), text.end(), [](char c) { return chars::is(chars::digit, c); });
+    return std::all_of(
+        text.begin(), text.end(), [](char c) { return chars::is(chars::digit, c); });
 }
 
 /// ASCII letters only; `word` is in lower case.
 bool consumeWord(std::string_view& text, std::string_view word) {
     const auto sameLetter = [](char a, char b) { return (a >= 'A' && a <= 'Z' ? a - 'A' + 'a' : a) == b; };
     if (text.size() < word.size() || !std::equal(word.begin(), word.end(), text.begin(),
-                                                 [&](char expected, char c) { return sameLetter(c, expected); })) {
+                                                 [&](char expected, char c) { return sameLetter(c, expected); }))
         return false;
-    }
     text.remove_prefix(word.size());
     return true;
 }
@@ -39,12 +39,10 @@ constexpr double kNotANumber = std::numeric_limits<double>::quiet_NaN();
 
 /// The spellings of newer runtimes: `inf`, `infinity`, `nan`, `nan(letters)`.
 std::optional<double> parseWordForm(std::string_view text) {
-    if (consumeWord(text, "inf")) {
+    if (consumeWord(text, "inf"))
         return text.empty() || (consumeWord(text, "inity") && text.empty()) ? std::optional(kInfinity) : std::nullopt;
-    }
-    if (!consumeWord(text, "nan")) {
+    if (!consumeWord(text, "nan"))
         return std::nullopt;
-    }
     const bool plain = text.empty();
     const bool tagged = text.size() >= 2 && text.front() == '(' && text.back() == ')' &&
                         std::all_of(text.begin() + 1, text.end() - 1, isLetterOrDigit);
@@ -61,14 +59,12 @@ std::optional<double> parseHashForm(std::string_view text) {
         {"inf", kInfinity}, {"ind", kNotANumber}, {"nan", kNotANumber}, {"qnan", kNotANumber}, {"snan", kNotANumber}};
 
     const std::size_t hash = text.find(".#");
-    if (hash == 0 || hash == std::string_view::npos || !allDigits(text.substr(0, hash))) {
+    if (hash == 0 || hash == std::string_view::npos || !allDigits(text.substr(0, hash)))
         return std::nullopt;
-    }
     for (const Row& row : kWords) {
         std::string_view rest = text.substr(hash + 2);
-        if (consumeWord(rest, row.word) && allDigits(rest)) {
+        if (consumeWord(rest, row.word) && allDigits(rest))
             return row.value;
-        }
     }
     return std::nullopt;
 }
@@ -89,9 +85,8 @@ Real outOfRange(std::string_view number) {
         const bool down = digits.front() == '-';
         digits.remove_prefix(isSign(digits.front()) ? 1 : 0);
         const auto result = std::from_chars(digits.data(), digits.data() + digits.size(), exponent);
-        if (result.ec != std::errc()) {
+        if (result.ec != std::errc())
             exponent = std::numeric_limits<std::int64_t>::max() / 2;
-        }
         exponent = down ? -exponent : exponent;
         exponent = std::clamp(exponent, -(std::int64_t{1} << 60), std::int64_t{1} << 60);
     }
@@ -104,13 +99,11 @@ template <class Real>
 std::optional<Real> parse(std::string_view token) {
     if (!token.empty() && token.front() == '+') {
         token.remove_prefix(1);
-        if (!token.empty() && isSign(token.front())) {
+        if (!token.empty() && isSign(token.front()))
             return std::nullopt;
-        }
     }
-    if (token.empty()) {
+    if (token.empty())
         return std::nullopt;
-    }
     const char* const end = token.data() + token.size();
     Real number = 0;
     const auto result = std::from_chars(token.data(), end, number);
@@ -124,28 +117,26 @@ std::optional<Real> parse(std::string_view token) {
 } // namespace
 
 const char* commentEnd(const char* text, const char* end) {
-    return std::find_if(text, end, [](char c) { return c == '\n' || c == '\r'; });
+    return std::find_if(
+        text, end, [](char c) { return c == '\n' || c == '\r'; });
 }
 
 const char* skipComments(const char* text, const char* end) {
     while (text != end && *text == ';') {
         text = commentEnd(text, end);
-        while (text != end && chars::is(chars::blank, *text)) {
+        while (text != end && chars::is(chars::blank, *text))
             ++text;
-        }
     }
     return text;
 }
 
 std::optional<double> parseNonFinite(std::string_view token) {
     const bool negative = !token.empty() && token.front() == '-';
-    if (!token.empty() && isSign(token.front())) {
+    if (!token.empty() && isSign(token.front()))
         token.remove_prefix(1);
-    }
     std::optional<double> value = parseWordForm(token);
-    if (!value) {
+    if (!value)
         value = parseHashForm(token);
-    }
     return value && negative ? std::optional(-*value) : value;
 }
 
@@ -154,17 +145,15 @@ std::optional<double> parseReal(std::string_view token) { return parse<double>(t
 std::optional<float> parseFloat(std::string_view token) { return parse<float>(token); }
 
 std::optional<std::int64_t> parseInteger(std::string_view token) {
-    if (token.size() > 1 && token.front() == '+' && !isSign(token[1])) {
+    if (token.size() > 1 && token.front() == '+' && !isSign(token[1]))
         token.remove_prefix(1);
-    }
     // Most are short; those cannot overflow.
     constexpr std::size_t kFits = 18;
     if (!token.empty() && token.size() <= kFits && token.front() != '-') {
         std::int64_t number = 0;
         for (const char c : token) {
-            if (!chars::is(chars::digit, c)) {
+            if (!chars::is(chars::digit, c))
                 return std::nullopt;
-            }
             number = 10 * number + (c - '0');
         }
         return number;
@@ -172,9 +161,8 @@ std::optional<std::int64_t> parseInteger(std::string_view token) {
     const char* const end = token.data() + token.size();
     std::int64_t number = 0;
     const auto result = std::from_chars(token.data(), end, number);
-    if (result.ec != std::errc() || result.ptr != end || (number == 0 && token.front() == '-')) {
+    if (result.ec != std::errc() || result.ptr != end || (number == 0 && token.front() == '-'))
         return std::nullopt;
-    }
     return number;
 }
 

@@ -23,15 +23,12 @@ enum Kind : std::uint8_t { blank = 1, delimiter = 2, digit = 4, letter = 8 };
 
 inline constexpr auto kKinds = [] {
     std::array<std::uint8_t, 256> kinds{};
-    for (const char c : std::string_view(" \t\r\n")) {
+    for (const char c : std::string_view(" \t\r\n"))
         kinds[static_cast<unsigned char>(c)] = blank | delimiter;
-    }
-    for (const char c : std::string_view(",{};\":")) {
+    for (const char c : std::string_view(",{};\":"))
         kinds[static_cast<unsigned char>(c)] = delimiter;
-    }
-    for (char c = '0'; c <= '9'; ++c) {
+    for (char c = '0'; c <= '9'; ++c)
         kinds[static_cast<unsigned char>(c)] = digit;
-    }
     for (char c = 'a'; c <= 'z'; ++c) {
         kinds[static_cast<unsigned char>(c)] = letter;
         kinds[static_cast<unsigned char>(c - 'a' + 'A')] = letter;
@@ -45,9 +42,8 @@ inline constexpr auto kKinds = [] {
 
 /// The end of a number, name or word: the next blank, bracket, comma, quote, colon or comment.
 [[nodiscard]] inline const char* tokenEnd(const char* text, const char* end) {
-    while (text != end && !chars::is(chars::delimiter, *text)) {
+    while (text != end && !chars::is(chars::delimiter, *text))
         ++text;
-    }
     return text;
 }
 
@@ -58,17 +54,15 @@ inline constexpr auto kKinds = [] {
 [[nodiscard]] const char* skipComments(const char* text, const char* end);
 /// Skips blanks and comments.
 [[nodiscard]] inline const char* skipBlanks(const char* text, const char* end) {
-    while (text != end && chars::is(chars::blank, *text)) {
+    while (text != end && chars::is(chars::blank, *text))
         ++text;
-    }
     return text == end || *text != ';' ? text : skipComments(text, end);
 }
 /// Skips blanks, comments and commas: what separates two values. Surplus commas are ignored.
 [[nodiscard]] inline const char* skipSeparators(const char* text, const char* end) {
     text = skipBlanks(text, end);
-    while (text != end && *text == ',') {
+    while (text != end && *text == ',')
         text = skipBlanks(text + 1, end);
-    }
     return text;
 }
 
@@ -88,22 +82,19 @@ inline constexpr auto kKinds = [] {
     while (end - text >= 8) {
         const int count = digitsOfEight(text);
         text += count;
-        if (count < 8) {
+        if (count < 8)
             return text;
-        }
     }
-    while (text != end && chars::is(chars::digit, *text)) {
+    while (text != end && chars::is(chars::digit, *text))
         ++text;
-    }
     return text;
 }
 
 /// The end of the plain number (no infinity, no NaN) that starts here; the start itself when there is none.
 [[nodiscard]] inline const char* plainNumberEnd(const char* start, const char* end) {
     const char* text = start;
-    if (text != end && (*text == '-' || *text == '+')) {
+    if (text != end && (*text == '-' || *text == '+'))
         ++text;
-    }
     const char* const whole = text;
     text = skipDigits(text, end);
     auto digits = text - whole;
@@ -112,18 +103,15 @@ inline constexpr auto kKinds = [] {
         text = skipDigits(text, end);
         digits += text - fraction;
     }
-    if (digits == 0) {
+    if (digits == 0)
         return start;
-    }
     if (text != end && (*text == 'e' || *text == 'E')) {
         const char* exponent = text + 1;
-        if (exponent != end && (*exponent == '-' || *exponent == '+')) {
+        if (exponent != end && (*exponent == '-' || *exponent == '+'))
             ++exponent;
-        }
         text = skipDigits(exponent, end);
-        if (text == exponent) {
+        if (text == exponent)
             return start;
-        }
     }
     return text;
 }

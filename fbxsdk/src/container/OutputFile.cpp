@@ -33,9 +33,8 @@ std::string behindLinks(const std::string& name, int& error) {
     std::error_code failure;
     fs::path path(name);
     for (int i = 0; i < kMostLinks; ++i) {
-        if (!fs::is_symlink(fs::symlink_status(path, failure))) {
+        if (!fs::is_symlink(fs::symlink_status(path, failure)))
             return path.string();
-        }
         const fs::path next = fs::read_symlink(path, failure);
         path = next.is_absolute() ? next : path.parent_path() / next;
     }
@@ -56,9 +55,8 @@ int tryNames(const std::string& folder, std::string& path, const Make& make) {
     for (int i = 0; i < kMostNames; ++i) {
         path = prefix + std::to_string(nextName++) + ".part";
         const int error = make();
-        if (error != EEXIST) {
+        if (error != EEXIST)
             return error;
-        }
     }
     return EEXIST;
 }
@@ -77,9 +75,8 @@ OutputFile::OutputFile(std::string fileName, FileOperations& operations)
 OutputFile::~OutputFile() { discard(); }
 
 void OutputFile::note(int error) {
-    if (mError == 0) {
+    if (mError == 0)
         mError = error;
-    }
 }
 
 void OutputFile::report(FbxStatus& status) const {
@@ -99,28 +96,23 @@ bool OutputFile::fail(int error, FbxStatus& status) {
 }
 
 bool OutputFile::open(FbxStatus& status) {
-    if (mName.empty()) {
+    if (mName.empty())
         return fail(ENOENT, status);
-    }
     struct stat existing {};
     // Before links are followed: that of a standard stream does not lead to the name of a file.
-    if (::stat(mName.c_str(), &existing) == 0 && isStream(existing)) {
+    if (::stat(mName.c_str(), &existing) == 0 && isStream(existing))
         return openStream(status);
-    }
     int error = 0;
     mTarget = behindLinks(mName, error);
-    if (error != 0) {
+    if (error != 0)
         return fail(error, status);
-    }
     mFolder = folderOf(mTarget);
     const bool exists = ::stat(mTarget.c_str(), &existing) == 0;
-    if (exists && S_ISDIR(existing.st_mode)) {
+    if (exists && S_ISDIR(existing.st_mode))
         return fail(EISDIR, status);
-    }
     // Renaming would replace a file that its owner has locked.
-    if (exists && ::faccessat(AT_FDCWD, mTarget.c_str(), W_OK, AT_EACCESS) != 0) {
+    if (exists && ::faccessat(AT_FDCWD, mTarget.c_str(), W_OK, AT_EACCESS) != 0)
         return fail(errno, status);
-    }
     constexpr mode_t kPermissions = 07777;
     error = openBeside(exists ? existing.st_mode & kPermissions : 0U);
     return error == 0 || fail(error, status);
@@ -135,40 +127,35 @@ bool OutputFile::openStream(FbxStatus& status) {
 int OutputFile::openBeside(unsigned permissions) {
     std::string path;
     const int error = tryNames(mFolder, path, [&] { return mOperations.create(path, permissions, mFile); });
-    if (error == 0) {
+    if (error == 0)
         mTemporary = std::move(path);
-    }
     return error;
 }
 
 int OutputFile::openSpool() {
     std::error_code failure;
     const std::string folder = (std::filesystem::temp_directory_path(failure) / "").string();
-    if (failure) {
+    if (failure)
         return failure.value();
-    }
     constexpr unsigned kOnlyForUs = 0600;
     std::string path;
     const int error = tryNames(folder, path, [&] { return mOperations.create(path, kOnlyForUs, mFile); });
-    if (error == 0) {
+    if (error == 0)
         mOperations.remove(path); // the file itself exists until it is closed
-    }
     return error;
 }
 
 void OutputFile::write(std::span<const char> bytes) {
-    if (failed()) {
+    if (failed())
         return;
-    }
     if (bytes.size() >= kBufferBytes) {
         flushBuffer();
         sendBuffer(bytes);
         return;
     }
     mBuffer.append(bytes.data(), bytes.size());
-    if (mBuffer.size() >= kBufferBytes) {
+    if (mBuffer.size() >= kBufferBytes)
         flushBuffer();
-    }
 }
 
 void OutputFile::flushBuffer() {
@@ -177,34 +164,29 @@ void OutputFile::flushBuffer() {
 }
 
 void OutputFile::sendBuffer(std::span<const char> bytes) {
-    if (!failed() && mFile < 0) {
+    if (!failed() && mFile < 0)
         note(openSpool());
-    }
-    if (!failed() && !bytes.empty()) {
+    if (!failed() && !bytes.empty())
         note(mOperations.writeAt(mFile, mWritten, bytes));
-    }
     mWritten += bytes.size();
 }
 
 void OutputFile::overwrite(std::uint64_t offset, std::span<const char> bytes) {
-    if (failed()) {
+    if (failed())
         return;
-    }
     assert(offset + bytes.size() <= size());
     const auto before =
         static_cast<std::size_t>(offset < mWritten ? std::min<std::uint64_t>(mWritten - offset, bytes.size()) : 0);
-    if (before > 0) {
+    if (before > 0)
         note(mOperations.writeAt(mFile, offset, bytes.first(before)));
-    }
     const std::span<const char> rest = bytes.subspan(before);
     std::copy(rest.begin(), rest.end(),
               mBuffer.begin() + static_cast<std::ptrdiff_t>(std::max(offset, mWritten) - mWritten));
 }
 
 void OutputFile::extend(std::uint64_t newSize) {
-    if (failed() || newSize <= size()) {
+    if (failed() || newSize <= size())
         return;
-    }
     const std::uint64_t gap = newSize - size();
     if (gap < kBufferBytes) {
         mBuffer.append(static_cast<std::size_t>(gap), '\0');
@@ -228,18 +210,15 @@ bool OutputFile::commitTogether(std::span<OutputFile* const> files, FbxStatus& s
     // After the last rename nothing can fail and make its old file necessary.
     const bool done = all(files, &OutputFile::complete) && all(files.first(files.size() - 1), &OutputFile::keepOld) &&
                       all(files, &OutputFile::takeName);
-    for (OutputFile* file : files) {
-        if (done) {
+    for (OutputFile* file : files)
+        if (done)
             file->forgetOld();
-        } else {
+        else
             file->discard();
-        }
-    }
     for (std::size_t i = 0; done && i < files.size(); ++i) {
         const bool again = i + 1 < files.size() && files[i + 1]->mFolder == files[i]->mFolder;
-        if (!again && !files[i]->mDirect) {
+        if (!again && !files[i]->mDirect)
             files[i]->mOperations.flushFolder(files[i]->mFolder);
-        }
     }
     return done;
 }
@@ -255,14 +234,12 @@ bool OutputFile::complete(FbxStatus& status) {
 }
 
 bool OutputFile::keepOld(FbxStatus& status) {
-    if (mDirect) {
+    if (mDirect)
         return true;
-    }
     std::string path;
     const int error = tryNames(mFolder, path, [&] { return mOperations.link(mTarget, path); });
-    if (error == 0) {
+    if (error == 0)
         mOld = std::move(path);
-    }
     mStoodAlone = error == ENOENT;
     return error == 0 || mStoodAlone || isWithoutLinks(error) || fail(error, status);
 }
@@ -273,9 +250,8 @@ bool OutputFile::takeName(FbxStatus& status) {
         return !failed() || fail(mError, status);
     }
     const int error = mOperations.rename(mTemporary, mTarget);
-    if (error != 0) {
+    if (error != 0)
         return fail(error, status);
-    }
     mTemporary.clear();
     mTookName = true;
     return true;
@@ -287,14 +263,12 @@ void OutputFile::forgetOld() {
 }
 
 void OutputFile::sendDirectly() {
-    if (mFile >= 0) {
+    if (mFile >= 0)
         flushBuffer();
-    }
     int target = -1;
     note(failed() ? 0 : mOperations.openExisting(mTarget, target));
-    if (failed()) {
+    if (failed())
         return;
-    }
     note(sendTo(target));
     note(mOperations.close(target));
 }
@@ -305,9 +279,8 @@ int OutputFile::sendTo(int target) {
         piece.resize(static_cast<std::size_t>(std::min<std::uint64_t>(mWritten - offset, kBufferBytes)));
         int error = mOperations.readAt(mFile, offset, piece);
         error = error == 0 ? mOperations.write(target, piece) : error;
-        if (error != 0) {
+        if (error != 0)
             return error;
-        }
     }
     return mOperations.write(target, mBuffer);
 }
@@ -332,9 +305,8 @@ void OutputFile::discard() {
 void OutputFile::putBack() {
     if (mTookName && !mOld.empty()) {
         // Where another file of the same name has been restored already, both names stay.
-        if (mOperations.rename(mOld, mTarget) == 0) {
+        if (mOperations.rename(mOld, mTarget) == 0)
             mOperations.remove(mOld);
-        }
     } else if (mTookName && mStoodAlone) {
         mOperations.remove(mTarget);
     } else if (!mOld.empty()) {

@@ -68,9 +68,8 @@ void allow(std::span<const char>) {}
 PageMemory::PageMemory(std::size_t size) {
     void* const memory =
         ::mmap(nullptr, std::max<std::size_t>(size, 1), PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
-    if (memory == MAP_FAILED) {
+    if (memory == MAP_FAILED)
         throw std::bad_alloc();
-    }
     mBytes = {static_cast<char*>(memory), size};
 }
 

@@ -23,12 +23,10 @@ bool startsAsAscii(std::span<const char> bytes, ReadAhead& ahead) {
     for (std::size_t size = kFirstLook;; size *= 2) {
         const std::span<const char> start = bytes.first(std::min(size, bytes.size()));
         ahead.need(start);
-        if (isAscii(start)) {
+        if (isAscii(start))
             return true;
-        }
-        if (start.size() == bytes.size() || !mayBeginAscii(start)) {
+        if (start.size() == bytes.size() || !mayBeginAscii(start))
             return false;
-        }
     }
 }
 
@@ -36,9 +34,8 @@ Container containerOf(std::span<const char> bytes, ReadAhead& ahead) {
     constexpr std::size_t kEnoughForBinary = 32;
     const std::span<const char> start = bytes.first(std::min(kEnoughForBinary, bytes.size()));
     ahead.need(start);
-    if (isBinary(start)) {
+    if (isBinary(start))
         return Container::binary;
-    }
     return startsAsAscii(bytes, ahead) ? Container::ascii : Container::unknown;
 }
 
@@ -66,12 +63,10 @@ std::unique_ptr<RecordTree> readTree(std::span<const char> bytes, std::shared_pt
         tree->fileSize = bytes.size();
         tree->mapping = file;
         tree->file = std::move(file);
-        if (!readAny(bytes, *tree, status)) {
+        if (!readAny(bytes, *tree, status))
             return nullptr;
-        }
-        if (tree->file) {
+        if (tree->file)
             tree->file->requireUnchanged();
-        }
         status.Clear();
         return tree;
     } catch (const std::bad_alloc&) {
@@ -86,9 +81,8 @@ std::unique_ptr<RecordTree> readTree(std::span<const char> bytes, std::shared_pt
 
 Container containerOf(const std::string& fileName, FbxStatus& status) {
     const std::shared_ptr<const FileBytes> file = FileBytes::open(fileName, status);
-    if (!file) {
+    if (!file)
         return Container::unknown;
-    }
     auto container = Container::unknown;
     const bool known = faultToStatus(status, [&] {
         ReadAhead ahead(file->bytes(), file.get());
@@ -104,9 +98,8 @@ std::unique_ptr<RecordTree> readRecords(std::span<const char> bytes, const std::
 
 std::unique_ptr<RecordTree> readRecords(const std::string& fileName, FbxStatus& status) {
     std::shared_ptr<const FileBytes> file = FileBytes::open(fileName, status);
-    if (!file) {
+    if (!file)
         return nullptr;
-    }
     const std::span<const char> bytes = file->bytes();
     return readTree(bytes, std::move(file), fileName, status);
 }

@@ -199,9 +199,8 @@ private:
     template <class T>
     [[nodiscard]] void* allocate(std::size_t count) {
         static_assert(std::is_trivially_destructible_v<T> && alignof(T) == kAlignment);
-        if (count * sizeof(T) > mFree.size()) {
+        if (count * sizeof(T) > mFree.size())
             addBlock(count * sizeof(T));
-        }
         void* const place = mFree.data();
         mFree = mFree.subspan(count * sizeof(T));
         return place;

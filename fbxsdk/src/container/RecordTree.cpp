@@ -33,12 +33,10 @@ template <class Number>
 bool readScalars(std::span<const Value> values, std::span<Number> destination) {
     auto next = destination.begin();
     for (const Value& value : values) {
-        if (next == destination.end()) {
+        if (next == destination.end())
             break;
-        }
-        if (value.isNumber()) {
+        if (value.isNumber())
             *next++ = convertValue<Number>(value);
-        }
     }
     return next == destination.end();
 }
@@ -48,9 +46,8 @@ bool read(const Record& record, std::span<Number> destination) {
     const StoredArray* const array = findArray(record.values);
     const bool read = array != nullptr ? array->count >= destination.size() && decodeArray(*array, destination)
                                        : readScalars(record.values, destination);
-    if (!read) {
+    if (!read)
         std::fill(destination.begin(), destination.end(), Number{0});
-    }
     return read;
 }
 
@@ -95,11 +92,9 @@ char Value::toLetter() const {
 }
 
 const Record* Record::child(std::string_view childName) const {
-    for (const Record& record : children()) {
-        if (record.name == childName) {
+    for (const Record& record : children())
+        if (record.name == childName)
             return &record;
-        }
-    }
     return nullptr;
 }
 
@@ -111,9 +106,8 @@ const Value& Record::childValue(std::string_view childName) const {
 const StoredArray* Record::array() const { return findArray(values); }
 
 std::size_t Record::numberCount() const {
-    if (const StoredArray* const stored = array()) {
+    if (const StoredArray* const stored = array())
         return static_cast<std::size_t>(stored->count);
-    }
     return static_cast<std::size_t>(std::count_if(values.begin(), values.end(), isNumeric));
 }
 

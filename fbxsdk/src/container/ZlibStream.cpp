@@ -32,12 +32,10 @@ namespace {
 class Decompressor {
 public:
     bool inflate(std::span<const char> stream, std::span<char> destination) {
-        if (!mMemory) {
+        if (!mMemory)
             mMemory.reset(libdeflate_alloc_decompressor());
-        }
-        if (!mMemory) {
+        if (!mMemory)
             throw std::bad_alloc(); // not an error of the stream
-        }
         // Without a variable for the actual size the library requires the exact one.
         return libdeflate_zlib_decompress(mMemory.get(), stream.data(), stream.size(), destination.data(),
                                           destination.size(), nullptr) == LIBDEFLATE_SUCCESS;
@@ -59,9 +57,8 @@ public:
             std::memcpy(destination.data(), kept.bytes.data() + stream.size(), destination.size());
             return true;
         }
-        if (!mDecompressor.inflate(stream, destination)) {
+        if (!mDecompressor.inflate(stream, destination))
             return false;
-        }
         remember(kept, stream, destination);
         return true;
     }
@@ -79,9 +76,8 @@ private:
         Kept* oldest = mKept.data();
         for (Kept& kept : mKept) {
             if (kept.size == size && kept.streamSize == stream.size() && size != 0 &&
-                std::memcmp(kept.bytes.data(), stream.data(), stream.size()) == 0) {
+                std::memcmp(kept.bytes.data(), stream.data(), stream.size()) == 0)
                 return kept;
-            }
             oldest = kept.lastUse < oldest->lastUse ? &kept : oldest;
         }
         oldest->size = 0;
@@ -124,12 +120,10 @@ Deflater::Deflater() : mCompressor(std::make_unique<Compressor>()) {}
 Deflater::~Deflater() = default;
 
 std::span<const char> Deflater::deflated(std::span<const char> bytes) {
-    if (bytes.size() > kMostKeptBytes) {
+    if (bytes.size() > kMostKeptBytes)
         return deflatedAnew(bytes);
-    }
-    if (const Kept* const kept = find(bytes)) {
+    if (const Kept* const kept = find(bytes))
         return kept->stream;
-    }
     const std::span<const char> stream = deflatedAnew(bytes);
     Kept& kept = mKept[mOldest];
     mOldest = (mOldest + 1) % mKept.size();
@@ -147,9 +141,8 @@ const Deflater::Kept* Deflater::find(std::span<const char> bytes) const {
 }
 
 std::span<const char> Deflater::deflatedAnew(std::span<const char> bytes) {
-    if (bytes.empty() || !mCompressor->memory) {
+    if (bytes.empty() || !mCompressor->memory)
         return {};
-    }
     if (mMemorySize < bytes.size()) {
         mMemorySize = 0;
         mMemory = std::make_unique_for_overwrite<char[]>(bytes.size());

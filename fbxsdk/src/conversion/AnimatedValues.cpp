@@ -55,11 +55,10 @@ void scaleValue(FbxProperty& property, double factor) {
     FbxDouble3 value = property.Get<FbxDouble3>();
     for (int i = 0; i < 3; ++i)
         value[i] *= factor;
-    if (property.GetPropertyDataType().GetType() == eFbxDouble3) {
+    if (property.GetPropertyDataType().GetType() == eFbxDouble3)
         property.Set(value);
-    } else {
+    else
         property.Set(property.Get<FbxDouble>() * factor);
-    }
 }
 
 void permuteChannels(FbxAnimCurveNode& node, const SignedPermutation& permutation) {
@@ -71,10 +70,9 @@ void permuteChannels(FbxAnimCurveNode& node, const SignedPermutation& permutatio
         values[i] = node.channelValue(i);
         curves[i] = ownCurve(node, i);
     }
-    for (unsigned int i = 0; i < 3; ++i) {
+    for (unsigned int i = 0; i < 3; ++i)
         if (curves[i])
             node.DisconnectFromChannel(curves[i], i);
-    }
     for (unsigned int i = 0; i < 3; ++i) {
         const auto from = static_cast<std::size_t>(permutation.source[i]);
         node.setChannelValue(i, values[from] * permutation.sign[i]);
@@ -99,14 +97,14 @@ void scaleAnimated(FbxProperty property, double factor, const std::function<bool
     for (FbxAnimCurveNode* node : sourcesOf<FbxAnimCurveNode>(property)) {
         if (!applies(node->GetDstObject<FbxAnimLayer>()))
             continue;
-        for (unsigned int channel = 0; channel < node->GetChannelsCount(); ++channel) {
+        for (unsigned int channel = 0; channel < node->GetChannelsCount(); ++channel)
             scaleChannel(*node, channel, factor);
-        }
     }
 }
 
 void scaleAnimated(FbxProperty property, double factor) {
-    scaleAnimated(property, factor, [](const FbxAnimLayer*) { return true; });
+    scaleAnimated(
+        property, factor, [](const FbxAnimLayer*) { return true; });
 }
 
 void permuteAnimated(FbxProperty property, const SignedPermutation& permutation) {

@@ -94,11 +94,9 @@ std::vector<FbxNode*> independentBelow(FbxNode& root) {
 }
 
 void scaleCameraPlanes(FbxScene& scene, double k) {
-    for (FbxCamera* camera : detail::sourcesOf<FbxCamera>(scene)) {
-        for (const char* plane : {"NearPlane", "FarPlane", "BackPlaneDistance", "FrontPlaneDistance"}) {
+    for (FbxCamera* camera : detail::sourcesOf<FbxCamera>(scene))
+        for (const char* plane : {"NearPlane", "FarPlane", "BackPlaneDistance", "FrontPlaneDistance"})
             scaleAnimated(camera->FindProperty(plane), k);
-        }
-    }
 }
 
 void scaleLimits(FbxNode& node, double k, std::initializer_list<const char*> limits) {

@@ -22,11 +22,9 @@ constexpr double kSingularDeterminant = 16.0 * DBL_EPSILON;
 /// Writes axes times scale into the upper left 3×3 part.
 template <typename Scale>
 void storeAxes(FbxAMatrix& matrix, const Axes& axes, const Scale& scale) {
-    for (size_t i = 0; i < 3; ++i) {
-        for (size_t j = 0; j < 3; ++j) {
+    for (size_t i = 0; i < 3; ++i)
+        for (size_t j = 0; j < 3; ++j)
             matrix.mData[i].mData[j] = axes[i][j] * scale[static_cast<int>(i)];
-        }
-    }
 }
 
 /// The inverse by cofactors; false when there is none.
@@ -41,14 +39,11 @@ bool invertUnitRows(const double (&m)[3][3], double (&inverse)[3][3]) {
         }
     }
     const double determinant = m[0][0] * inverse[0][0] + m[0][1] * inverse[1][0] + m[0][2] * inverse[2][0];
-    if (!(std::abs(determinant) > kSingularDeterminant)) {
+    if (!(std::abs(determinant) > kSingularDeterminant))
         return false; // NaN too
-    }
-    for (auto& row : inverse) {
-        for (double& element : row) {
+    for (auto& row : inverse)
+        for (double& element : row)
             element /= determinant;
-        }
-    }
     return true;
 }
 
@@ -60,22 +55,17 @@ bool invertAxes(const FbxAMatrix& matrix, double (&inverse)[3][3]) {
     for (size_t i = 0; i < 3; ++i) {
         const double* row = matrix.mData[i].mData;
         const double largest = std::max({std::abs(row[0]), std::abs(row[1]), std::abs(row[2])});
-        if (!(largest > 0.0) || std::isinf(largest)) {
+        if (!(largest > 0.0) || std::isinf(largest))
             return false;
-        }
         exponents[i] = std::ilogb(largest);
-        for (size_t j = 0; j < 3; ++j) {
+        for (size_t j = 0; j < 3; ++j)
             rows[i][j] = std::scalbn(row[j], -exponents[i]);
-        }
     }
-    if (!invertUnitRows(rows, inverse)) {
+    if (!invertUnitRows(rows, inverse))
         return false;
-    }
-    for (auto& row : inverse) {
-        for (size_t j = 0; j < 3; ++j) {
+    for (auto& row : inverse)
+        for (size_t j = 0; j < 3; ++j)
             row[j] = std::scalbn(row[j], -exponents[j]);
-        }
-    }
     return true;
 }
 
@@ -95,17 +85,14 @@ FbxVector4 FbxAMatrix::GetS() const {
 FbxQuaternion FbxAMatrix::GetQ() const { return detail::quaternionFromAxes(detail::decompose(*this).axes); }
 
 void FbxAMatrix::SetIdentity() {
-    for (int i = 0; i < 4; ++i) {
-        for (int j = 0; j < 4; ++j) {
+    for (int i = 0; i < 4; ++i)
+        for (int j = 0; j < 4; ++j)
             mData[i][j] = i == j ? 1.0 : 0.0;
-        }
-    }
 }
 
 void FbxAMatrix::SetT(const FbxVector4& pT) {
-    for (int j = 0; j < 3; ++j) {
+    for (int j = 0; j < 3; ++j)
         mData[3][j] = pT[j];
-    }
 }
 
 void FbxAMatrix::SetR(const FbxVector4& pR) {
@@ -149,35 +136,29 @@ FbxAMatrix FbxAMatrix::operator*(const FbxAMatrix& pOther) const { return detail
 
 FbxAMatrix FbxAMatrix::operator*(double pValue) const {
     FbxAMatrix result = *this;
-    for (FbxDouble4& row : result.mData) {
-        for (double& element : row.mData) {
+    for (FbxDouble4& row : result.mData)
+        for (double& element : row.mData)
             element *= pValue;
-        }
-    }
     return result;
 }
 
 FbxAMatrix FbxAMatrix::operator/(double pValue) const {
     FbxAMatrix result = *this;
-    for (FbxDouble4& row : result.mData) {
-        for (double& element : row.mData) {
+    for (FbxDouble4& row : result.mData)
+        for (double& element : row.mData)
             element /= pValue;
-        }
-    }
     return result;
 }
 
 FbxAMatrix FbxAMatrix::Inverse() const {
     double axes[3][3];
     FbxAMatrix inverse;
-    if (!invertAxes(*this, axes)) {
+    if (!invertAxes(*this, axes))
         return inverse;
-    }
     const FbxDouble4& t = mData[3];
     for (int j = 0; j < 3; ++j) {
-        for (int i = 0; i < 3; ++i) {
+        for (int i = 0; i < 3; ++i)
             inverse.mData[i][j] = axes[i][j];
-        }
         inverse.mData[3][j] = 0.0 - (t[0] * axes[0][j] + t[1] * axes[1][j] + t[2] * axes[2][j]);
     }
     return inverse;

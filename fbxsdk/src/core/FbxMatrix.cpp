@@ -15,24 +15,20 @@ namespace {
 /// The row at or below the diagonal whose element in the column is largest.
 int pivotRow(const FbxMatrix& matrix, int column) {
     int best = column;
-    for (int row = column + 1; row < 4; ++row) {
-        if (std::abs(matrix.mData[row][column]) > std::abs(matrix.mData[best][column])) {
+    for (int row = column + 1; row < 4; ++row)
+        if (std::abs(matrix.mData[row][column]) > std::abs(matrix.mData[best][column]))
             best = row;
-        }
-    }
     return best;
 }
 
 void addRow(FbxDouble4& row, const FbxDouble4& other, double factor) {
-    for (int j = 0; j < 4; ++j) {
+    for (int j = 0; j < 4; ++j)
         row[j] += other[j] * factor;
-    }
 }
 
 void divideRow(FbxDouble4& row, double divisor) {
-    for (double& element : row.mData) {
+    for (double& element : row.mData)
         element /= divisor;
-    }
 }
 
 } // namespace
@@ -40,9 +36,8 @@ void divideRow(FbxDouble4& row, double divisor) {
 FbxVector4 FbxMatrix::GetColumn(int pX) const { return {mData[0][pX], mData[1][pX], mData[2][pX], mData[3][pX]}; }
 
 void FbxMatrix::SetColumn(int pX, const FbxVector4& pColumn) {
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         mData[i][pX] = pColumn[i];
-    }
 }
 
 FbxMatrix FbxMatrix::operator*(const FbxMatrix& pOther) const { return detail::product<FbxMatrix>(*this, pOther); }
@@ -53,9 +48,8 @@ FbxMatrix FbxMatrix::Inverse() const {
     for (int column = 0; column < 4; ++column) {
         const int pivot = pivotRow(rest, column);
         const double divisor = rest.mData[pivot][column];
-        if (!(std::abs(divisor) > 0.0)) {
+        if (!(std::abs(divisor) > 0.0))
             return {}; // NaN too
-        }
         std::swap(rest.mData[pivot], rest.mData[column]);
         std::swap(inverse.mData[pivot], inverse.mData[column]);
         divideRow(rest.mData[column], divisor);

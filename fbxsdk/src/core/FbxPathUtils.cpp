@@ -23,9 +23,8 @@ struct Path {
 
 std::string withForwardSlashes(const char* text) {
     std::string path(text ? text : "");
-    for (char& letter : path) {
+    for (char& letter : path)
         letter = letter == '\\' ? '/' : letter;
-    }
     return path;
 }
 
@@ -33,13 +32,11 @@ bool isLetter(char c) { return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
 
 /// The length of the root of a path with forward slashes in bytes. "C:" without separator is a root only by itself.
 size_t rootLength(std::string_view path) {
-    if (path.size() >= 2 && isLetter(path[0]) && path[1] == ':') {
+    if (path.size() >= 2 && isLetter(path[0]) && path[1] == ':')
         return path.size() == 2 ? 2 : path[2] == '/' ? 3 : 0;
-    }
     const bool server = path.size() > 2 && path[0] == '/' && path[1] == '/' && path[2] != '/';
-    if (server) {
+    if (server)
         return std::min(path.find('/', 2), path.size());
-    }
     return path.empty() || path[0] != '/' ? 0 : 1;
 }
 
@@ -50,23 +47,20 @@ Path parse(const std::string& text) {
     Path path;
     const size_t rootEnd = rootLength(text);
     path.root = text.substr(0, rootEnd);
-    if (path.root.size() == 2 && path.root[1] == ':') {
+    if (path.root.size() == 2 && path.root[1] == ':')
         path.root += '/';
-    }
 
     for (size_t begin = rootEnd; begin < text.size();) {
         const size_t end = std::min(text.find('/', begin), text.size());
         const std::string component = text.substr(begin, end - begin);
         begin = end + 1;
-        if (component.empty() || component == ".") {
+        if (component.empty() || component == ".")
             continue;
-        }
         const bool climbs = component == "..";
-        if (climbs && !path.components.empty() && path.components.back() != "..") {
+        if (climbs && !path.components.empty() && path.components.back() != "..")
             path.components.pop_back();
-        } else if (!climbs || path.root.empty()) {
+        else if (!climbs || path.root.empty())
             path.components.push_back(component);
-        }
     }
     return path;
 }
@@ -74,9 +68,8 @@ Path parse(const std::string& text) {
 std::string join(const Path& path) {
     std::string text = path.root;
     for (const std::string& component : path.components) {
-        if (!text.empty() && text.back() != '/') {
+        if (!text.empty() && text.back() != '/')
             text += '/';
-        }
         text += component;
     }
     return text;
@@ -88,12 +81,10 @@ std::string clean(const std::string& text) {
 }
 
 std::string joined(std::string root, const std::string& file) {
-    if (root.empty() || isAbsolute(file)) {
+    if (root.empty() || isAbsolute(file))
         return file;
-    }
-    if (root.back() != '/') {
+    if (root.back() != '/')
         root += '/';
-    }
     return root + file;
 }
 
@@ -116,9 +107,8 @@ bool sameRoot(const std::string& a, const std::string& b) {
 std::string relativeTo(const Path& root, const Path& target) {
     size_t common = 0;
     while (common < root.components.size() && common < target.components.size() &&
-           root.components[common] == target.components[common]) {
+           root.components[common] == target.components[common])
         ++common;
-    }
     Path relative;
     relative.components.assign(root.components.size() - common, "..");
     relative.components.insert(relative.components.end(),
@@ -151,9 +141,8 @@ FbxString FbxPathUtils::Bind(const char* pRootPath, const char* pFilePath, bool 
 FbxString FbxPathUtils::GetFolderName(const char* pFilePath) {
     std::string path = withForwardSlashes(pFilePath);
     path.resize(nameBegin(path));
-    while (path.size() > rootLength(path) && path.back() == '/') {
+    while (path.size() > rootLength(path) && path.back() == '/')
         path.pop_back();
-    }
     return toFbxString(path);
 }
 
@@ -173,9 +162,8 @@ FbxString FbxPathUtils::GetExtensionName(const char* pFilePath) {
 FbxString FbxPathUtils::ChangeExtension(const char* pFilePath, const char* pExtension) {
     std::string path = withForwardSlashes(pFilePath);
     std::string extension(pExtension ? pExtension : "");
-    if (!extension.empty() && extension.front() != '.') {
+    if (!extension.empty() && extension.front() != '.')
         extension.insert(extension.begin(), '.');
-    }
     path.resize(dotOf(path));
     return toFbxString(path + extension);
 }
@@ -223,9 +211,8 @@ FbxString FbxPathUtils::GenerateFileName(const char* pFolder, const char* pPrefi
     for (int number = 1; number <= kAttempts; ++number) {
         const std::string path = joined(folder, std::string(pPrefix ? pPrefix : "") + std::to_string(number));
         std::error_code error;
-        if (!fs::exists(toSystemPath(path), error)) {
+        if (!fs::exists(toSystemPath(path), error))
             return toFbxString(path);
-        }
     }
     return {};
 }

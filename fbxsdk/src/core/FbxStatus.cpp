@@ -30,11 +30,9 @@ constexpr SentenceRow kSentences[] = {
 };
 
 constexpr bool inEnumeratorOrder() {
-    for (int i = 0; i < static_cast<int>(std::size(kSentences)); ++i) {
-        if (kSentences[i].code != i) {
+    for (int i = 0; i < static_cast<int>(std::size(kSentences)); ++i)
+        if (kSentences[i].code != i)
             return false;
-        }
-    }
     return true;
 }
 static_assert(std::size(kSentences) == FbxStatus::eSceneCheckFail + 1 && inEnumeratorOrder());
@@ -63,9 +61,8 @@ void FbxStatus::SetCode(EStatusCode pCode, const char* pErrorMsg, ...) {
 
     // built separately: the message that is replaced may be one of the arguments
     std::string sentence(length > 0 ? static_cast<size_t>(length) : 0, '\0');
-    if (length > 0) {
+    if (length > 0)
         std::vsnprintf(sentence.data(), sentence.size() + 1, pErrorMsg, arguments);
-    }
     va_end(arguments);
     mCode = pCode;
     mSentence = std::move(sentence);

@@ -80,9 +80,8 @@ FbxString FbxString::Mid(size_t pFirst) const { return Mid(pFirst, std::string::
 
 FbxString FbxString::Mid(size_t pFirst, size_t pCount) const {
     FbxString result;
-    if (pFirst < mText.size()) {
+    if (pFirst < mText.size())
         result.mText = mText.substr(pFirst, pCount);
-    }
     return result;
 }
 

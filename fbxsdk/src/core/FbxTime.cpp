@@ -43,11 +43,9 @@ constexpr TimeModeRow kTimeModes[] = {
 };
 
 constexpr bool inEnumeratorOrder() {
-    for (int i = 0; i < static_cast<int>(std::size(kTimeModes)); ++i) {
-        if (kTimeModes[i].mode != i) {
+    for (int i = 0; i < static_cast<int>(std::size(kTimeModes)); ++i)
+        if (kTimeModes[i].mode != i)
             return false;
-        }
-    }
     return true;
 }
 static_assert(std::size(kTimeModes) == FbxTime::eModesCount && inEnumeratorOrder());
@@ -77,15 +75,12 @@ bool isUsableRate(double rate) { return rate > 0.0 && std::isfinite(rate); }
 
 /// Saturating and always defined: every long double becomes a tick count, NaN becomes 0.
 FbxLongLong saturated(long double ticks) {
-    if (std::isnan(ticks)) {
+    if (std::isnan(ticks))
         return 0;
-    }
-    if (ticks >= static_cast<long double>(FBXSDK_TC_INFINITY)) {
+    if (ticks >= static_cast<long double>(FBXSDK_TC_INFINITY))
         return FBXSDK_TC_INFINITY;
-    }
-    if (ticks <= static_cast<long double>(FBXSDK_TC_MINFINITY)) {
+    if (ticks <= static_cast<long double>(FBXSDK_TC_MINFINITY))
         return FBXSDK_TC_MINFINITY;
-    }
     return static_cast<FbxLongLong>(ticks);
 }
 
@@ -98,9 +93,8 @@ FbxLongLong saturated(Wide ticks) {
 FbxLongLong rounded(long double ticks) {
     const FbxLongLong whole = saturated(ticks);
     const long double rest = ticks - static_cast<long double>(whole); // exact, unless the whole is the end of the range
-    if (rest >= 0.5L && whole < FBXSDK_TC_INFINITY) {
+    if (rest >= 0.5L && whole < FBXSDK_TC_INFINITY)
         return whole + 1;
-    }
     return rest <= -0.5L && whole > FBXSDK_TC_MINFINITY ? whole - 1 : whole;
 }
 
@@ -111,17 +105,15 @@ Wide wide(FbxLongLong ticks) { return ticks; }
 /// sample, and long double is several times slower.
 FbxLongLong ticksOfSeconds(double seconds) {
     constexpr double kTooMany = 268435456.0; // 2^28, which is more ticks than there are
-    if (!(std::abs(seconds) < kTooMany)) {
+    if (!(std::abs(seconds) < kTooMany))
         return saturated(static_cast<long double>(seconds) * kTicksPerSecond);
-    }
     constexpr int kMantissaBits = 52;
     constexpr int kUnitExponent = 1075; // of a double whose mantissa counts ones
     const auto bits = std::bit_cast<std::uint64_t>(std::abs(seconds));
     const int exponent = static_cast<int>(bits >> kMantissaBits);
     const int shift = kUnitExponent - exponent; // at least 25, as there are few seconds
-    if (shift > 90) {                           // the product has 89 bits at most; and here are all denormal numbers
+    if (shift > 90)                             // the product has 89 bits at most; and here are all denormal numbers
         return 0;
-    }
     const std::uint64_t leadingBit = std::uint64_t{1} << kMantissaBits;
     const Wide product = wide(static_cast<FbxLongLong>((bits & (leadingBit - 1)) | leadingBit)) * FBXSDK_TC_SECOND;
     const FbxLongLong ticks = saturated((product + (wide(1) << (shift - 1))) >> shift);
@@ -130,18 +122,16 @@ FbxLongLong ticksOfSeconds(double seconds) {
 
 /// Ticks per frame when that is a whole number, otherwise 0.
 FbxLongLong exactFrameTicks(double rate) {
-    if (rate != std::floor(rate) || rate > static_cast<double>(FBXSDK_TC_SECOND)) {
+    if (rate != std::floor(rate) || rate > static_cast<double>(FBXSDK_TC_SECOND))
         return 0;
-    }
     const auto wholeRate = static_cast<FbxLongLong>(rate);
     return FBXSDK_TC_SECOND % wholeRate == 0 ? FBXSDK_TC_SECOND / wholeRate : 0;
 }
 
 long double preciseFrames(FbxLongLong ticks, double rate) {
     const FbxLongLong frameTicks = exactFrameTicks(rate);
-    if (frameTicks != 0) {
+    if (frameTicks != 0)
         return static_cast<long double>(ticks) / static_cast<long double>(frameTicks);
-    }
     return static_cast<long double>(ticks) * static_cast<long double>(rate) / kTicksPerSecond;
 }
 
@@ -190,9 +180,8 @@ double FbxTime::GetFrameRate(EMode pTimeMode) {
     const GlobalTimeMode& global = globalTimeMode();
     const auto index = static_cast<size_t>(pTimeMode); // numbers from files may be anything
     const EMode mode = index < std::size(kTimeModes) && pTimeMode != eDefaultMode ? pTimeMode : global.mode;
-    if (mode == eCustom) {
+    if (mode == eCustom)
         return isUsableRate(global.customRate) ? global.customRate : kFallbackRate;
-    }
     return mode == eDefaultMode ? kFallbackRate : kTimeModes[mode].rate;
 }
 
@@ -211,9 +200,8 @@ FbxTime::EMode FbxTime::ConvertFrameRateToTimeMode(double pFrameRate, double pPr
 void FbxTime::SetGlobalTimeMode(EMode pTimeMode, double pFrameRate) {
     GlobalTimeMode& global = globalTimeMode();
     global.mode = static_cast<size_t>(pTimeMode) < std::size(kTimeModes) ? pTimeMode : eDefaultMode;
-    if (pTimeMode == eCustom) {
+    if (pTimeMode == eCustom)
         global.customRate = pFrameRate;
-    }
 }
 
 FbxTime::EMode FbxTime::GetGlobalTimeMode() { return globalTimeMode().mode; }
@@ -229,9 +217,8 @@ FbxTime FbxTime::operator-(const FbxTime& pTime) const { return saturated(wide(m
 FbxTime FbxTime::operator*(const FbxTime& pTime) const { return saturated(wide(mTime) * pTime.mTime); }
 
 FbxTime FbxTime::operator/(const FbxTime& pTime) const {
-    if (pTime.mTime == 0) {
+    if (pTime.mTime == 0)
         return mTime > 0 ? FBXSDK_TC_INFINITY : mTime < 0 ? FBXSDK_TC_MINFINITY : FBXSDK_TC_ZERO;
-    }
     return saturated(wide(mTime) / pTime.mTime);
 }
 
@@ -268,9 +255,8 @@ bool FbxTimeSpan::IsInside(FbxTime pTime) const {
 FbxTimeSpan FbxTimeSpan::Intersect(const FbxTimeSpan& pOther) const {
     const FbxTime first = std::max(std::min(mStart, mStop), std::min(pOther.mStart, pOther.mStop));
     const FbxTime last = std::min(std::max(mStart, mStop), std::max(pOther.mStart, pOther.mStop));
-    if (first > last) {
+    if (first > last)
         return {};
-    }
     return GetDirection() == FBXSDK_TIME_FORWARD ? FbxTimeSpan(first, last) : FbxTimeSpan(last, first);
 }
 

@@ -14,9 +14,8 @@ double FbxVector2::Length() const { return std::sqrt(SquareLength()); }
 
 void FbxVector2::Normalize() {
     const double length = Length();
-    if (length > 0.0) {
+    if (length > 0.0)
         *this /= length;
-    }
 }
 
 FbxVector4 FbxVector4::CrossProduct(const FbxVector4& pVector) const {
@@ -31,9 +30,8 @@ double FbxVector4::Distance(const FbxVector4& pVector) const { return (*this - p
 
 void FbxVector4::Normalize() {
     const double length = Length();
-    if (length > 0.0) {
+    if (length > 0.0)
         Set(mData[0] / length, mData[1] / length, mData[2] / length, mData[3]);
-    }
 }
 
 bool FbxColor::IsValid() const {

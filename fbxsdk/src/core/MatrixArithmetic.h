@@ -27,11 +27,9 @@ template <typename Matrix>
 template <typename Matrix>
 [[nodiscard]] Matrix transposed(const FbxDouble4x4& matrix) {
     Matrix result;
-    for (int i = 0; i < 4; ++i) {
-        for (int j = 0; j < 4; ++j) {
+    for (int i = 0; i < 4; ++i)
+        for (int j = 0; j < 4; ++j)
             result.mData[i][j] = matrix.mData[j][i];
-        }
-    }
     return result;
 }
 
@@ -41,9 +39,8 @@ template <typename Matrix>
         for (int j = 0; j < 4; ++j) {
             const double left = a.mData[i][j];
             const double right = b.mData[i][j];
-            if (left != right && !(std::abs(left - right) <= threshold)) {
+            if (left != right && !(std::abs(left - right) <= threshold))
                 return false;
-            }
         }
     }
     return true;

@@ -81,18 +81,16 @@ public:
     }
 
     void rethrow() const {
-        if (mFailure) {
+        if (mFailure)
             std::rethrow_exception(mFailure);
-        }
     }
 
 private:
     void stop(std::exception_ptr failure) {
         const std::lock_guard lock(mMutex);
         mNext = mCount;
-        if (!mFailure) {
+        if (!mFailure)
             mFailure = std::move(failure);
-        }
     }
 
     std::size_t mCount;
@@ -110,9 +108,8 @@ void forEachInParallel(std::size_t count, const std::function<void(std::size_t)>
     {
         std::vector<std::jthread> threads;
         try {
-            for (int i = 0; i < leave.count(); ++i) {
+            for (int i = 0; i < leave.count(); ++i)
                 threads.emplace_back([&crew] { crew.run(); });
-            }
         } catch (const std::exception&) { // no thread, or no memory for one: the others do the work
         }
         crew.run();
@@ -137,9 +134,8 @@ void WorkAhead::startThreads() {
     try {
         while (mThreads.size() < mStates.size()) {
             HelperLeave leave(1);
-            if (leave.count() == 0) {
+            if (leave.count() == 0)
                 break;
-            }
             mThreads.emplace_back([this, own = std::move(leave)] { workOn(); });
         }
     } catch (const std::exception&) { // no thread, or no memory for one: the others will do
@@ -150,29 +146,25 @@ void WorkAhead::startThreads() {
 void WorkAhead::workOn() {
     constexpr auto kPatience = std::chrono::milliseconds(20);
     while (true) {
-        while (const std::optional<std::size_t> piece = begin()) {
+        while (const std::optional<std::size_t> piece = begin())
             work(*piece);
-        }
         std::unique_lock lock(mMutex);
         const auto canGoOn = [this] { return mIsGivenUp || mReady < mMostReady; };
-        if (!hasOpen() || !mChanged.wait_for(lock, kPatience, canGoOn) || mIsGivenUp) {
+        if (!hasOpen() || !mChanged.wait_for(lock, kPatience, canGoOn) || mIsGivenUp)
             return;
-        }
     }
 }
 
 bool WorkAhead::hasOpen() {
-    while (mFirstOpen < mStates.size() && mStates[mFirstOpen] != State::open) {
+    while (mFirstOpen < mStates.size() && mStates[mFirstOpen] != State::open)
         ++mFirstOpen;
-    }
     return mFirstOpen < mStates.size();
 }
 
 std::optional<std::size_t> WorkAhead::begin() {
     const std::lock_guard lock(mMutex);
-    if (mIsGivenUp || mReady >= mMostReady || !hasOpen()) {
+    if (mIsGivenUp || mReady >= mMostReady || !hasOpen())
         return std::nullopt;
-    }
     mStates[mFirstOpen] = State::begun;
     mReady += mSizes[mFirstOpen];
     return mFirstOpen;
@@ -195,13 +187,11 @@ bool WorkAhead::take(std::size_t piece) {
     while (mStates[piece] == State::begun) {
         lock.unlock();
         const std::optional<std::size_t> other = begin();
-        if (other) {
+        if (other)
             work(*other);
-        }
         lock.lock();
-        if (!other) {
+        if (!other)
             mChanged.wait(lock, [&] { return mStates[piece] != State::begun; });
-        }
     }
     const State state = std::exchange(mStates[piece], State::taken);
     if (state == State::done || state == State::failed) {

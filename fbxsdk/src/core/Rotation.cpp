@@ -32,11 +32,9 @@ constexpr OrderRow kOrders[] = {
 };
 
 constexpr bool inEnumeratorOrder() {
-    for (int i = 0; i < static_cast<int>(std::size(kOrders)); ++i) {
-        if (kOrders[i].order != i) {
+    for (int i = 0; i < static_cast<int>(std::size(kOrders)); ++i)
+        if (kOrders[i].order != i)
             return false;
-        }
-    }
     return true;
 }
 static_assert(inEnumeratorOrder());
@@ -75,9 +73,8 @@ Vector3 coordinateAxis(size_t i) { return {i == 0 ? 1.0 : 0.0, i == 1 ? 1.0 : 0.
 /// The coordinate axis i without its part along a unit vector; the next coordinate axis when nothing is left.
 Vector3 perpendicularAxis(size_t i, const Vector3& unit) {
     Vector3 axis = coordinateAxis(i);
-    if (std::abs(dot(axis, unit)) > 1.0 - kParallel) {
+    if (std::abs(dot(axis, unit)) > 1.0 - kParallel)
         axis = coordinateAxis((i + 1) % 3);
-    }
     const double along = dot(axis, unit);
     const Vector3 rest = {axis[0] - along * unit[0], axis[1] - along * unit[1], axis[2] - along * unit[2]};
     return divided(rest, length(rest));
@@ -106,9 +103,8 @@ void completeAxes(Axes& axes, std::array<bool, 3> missing) {
             return;
         }
     }
-    if (missing[0] && missing[1] && missing[2]) {
+    if (missing[0] && missing[1] && missing[2])
         axes = {coordinateAxis(0), coordinateAxis(1), coordinateAxis(2)};
-    }
 }
 
 /// A number of right angles, and what is left, in -45 to 45 degrees; exact but for the sign of a zero, as std::remquo.
@@ -191,9 +187,8 @@ FbxVector4 eulerFromAxes(const Axes& axes, EFbxRotationOrder order) {
 
 Axes axesFromQuaternion(const FbxQuaternion& quaternion) {
     const double square = quaternion.DotProduct(quaternion);
-    if (!(square > kSmallestLength)) {
+    if (!(square > kSmallestLength))
         return {coordinateAxis(0), coordinateAxis(1), coordinateAxis(2)};
-    }
     const auto& [x, y, z, w] = quaternion.mData;
     const double s = 2.0 / square;
     return {{{1.0 - s * (y * y + z * z), s * (x * y + w * z), s * (x * z - w * y)},
@@ -209,15 +204,13 @@ FbxQuaternion quaternionFromAxes(const Axes& axes) {
     }
     // divide by the largest component, which is at least a half
     size_t i = axes[1][1] > axes[0][0] ? 1 : 0;
-    if (axes[2][2] > axes[i][i]) {
+    if (axes[2][2] > axes[i][i])
         i = 2;
-    }
     const size_t j = (i + 1) % 3;
     const size_t k = (i + 2) % 3;
     const double s = 2.0 * std::sqrt(std::max(0.0, 1.0 + axes[i][i] - axes[j][j] - axes[k][k]));
-    if (!(s > 0.0)) {
+    if (!(s > 0.0))
         return {};
-    }
     FbxQuaternion result;
     result.mData[i] = s / 4.0;
     result.mData[j] = (axes[i][j] + axes[j][i]) / s;
@@ -239,19 +232,16 @@ FbxQuaternion slerp(const FbxQuaternion& a, const FbxQuaternion& b, double weigh
     // half the chord and its counterpart give the angle to full precision, at both ends of its range
     const double angle = 2.0 * std::atan2((target - a).Length(), (target + a).Length());
     const double sine = std::sin(angle);
-    if (!(sine > kParallel)) {
+    if (!(sine > kParallel))
         return a * (1.0 - weight) + target * weight;
-    }
     return a * (std::sin((1.0 - weight) * angle) / sine) + target * (std::sin(weight * angle) / sine);
 }
 
 FbxAMatrix rotationMatrix(const Axes& axes) {
     FbxAMatrix matrix;
-    for (size_t i = 0; i < 3; ++i) {
-        for (size_t j = 0; j < 3; ++j) {
+    for (size_t i = 0; i < 3; ++i)
+        for (size_t j = 0; j < 3; ++j)
             matrix.mData[i].mData[j] = axes[i][j];
-        }
-    }
     return matrix;
 }
 
@@ -271,9 +261,8 @@ AxesAndScale decompose(const FbxAMatrix& matrix) {
         result.axes[i] = {row[0], row[1], row[2]};
         result.scale[i] = length(result.axes[i]);
         missing[i] = result.scale[i] < kSmallestLength;
-        if (!missing[i]) {
+        if (!missing[i])
             result.axes[i] = divided(result.axes[i], result.scale[i]);
-        }
     }
 
     if (missing[0] || missing[1] || missing[2]) {

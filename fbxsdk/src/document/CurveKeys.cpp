@@ -15,9 +15,8 @@ void compactAttributes(CurveKeys& keys) {
     std::vector<std::uint32_t> newIndex(keys.attributes.size(), kUnused);
     std::vector<KeyAttributes> used;
     for (std::uint32_t& index : keys.attributeOfKey) {
-        if (index >= newIndex.size()) {
+        if (index >= newIndex.size())
             continue;
-        }
         if (newIndex[index] == kUnused) {
             newIndex[index] = static_cast<std::uint32_t>(used.size());
             used.push_back(keys.attributes[index]);
@@ -44,9 +43,8 @@ void CurveKeys::setAttributes(std::size_t key, const KeyAttributes& keyAttribute
             return;
         }
     }
-    if (attributes.size() > 2 * attributeOfKey.size()) {
+    if (attributes.size() > 2 * attributeOfKey.size())
         compactAttributes(*this);
-    }
     attributes.push_back(keyAttributes);
     attributeOfKey[key] = static_cast<std::uint32_t>(attributes.size() - 1);
 }

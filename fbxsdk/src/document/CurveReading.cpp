@@ -116,10 +116,9 @@ Extrapolation readExtrapolation(const Record& owner, std::string_view name) {
     if (!record)
         return extrapolation;
     const char letter = record->childValue("Type").toLetter();
-    for (const ExtrapolationRow& row : kExtrapolations) {
+    for (const ExtrapolationRow& row : kExtrapolations)
         if (row.letter == letter)
             extrapolation.type = row.type;
-    }
     if (extrapolation.type == ExtrapolationType::constant)
         return extrapolation;
     constexpr std::int64_t kEndless = -1;

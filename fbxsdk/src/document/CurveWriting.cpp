@@ -96,7 +96,8 @@ void writeExtrapolations(RecordSink& sink, const VersionTraits& traits, const Cu
 
 template <class Row, std::size_t Count>
 const Row& rowOf(const Row (&rows)[Count], std::uint32_t flags) {
-    return *std::find_if(std::begin(rows), std::end(rows), [=](const Row& row) { return row.flags == flags; });
+    return *std::find_if(
+        std::begin(rows), std::end(rows), [=](const Row& row) { return row.flags == flags; });
 }
 
 /// How a cubic key is written: user or TCB tangents, or else automatic ones, whose letters say no more.

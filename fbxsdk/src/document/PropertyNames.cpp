@@ -26,18 +26,16 @@ bool isModelProperty(std::string_view name) {
 }
 
 std::string_view modernPropertyName(std::string_view subClass, std::string_view name) {
-    for (const OldPropertyName& row : kOldPropertyNames) {
+    for (const OldPropertyName& row : kOldPropertyNames)
         if (row.oldName == name && (row.subClass == subClass || row.className == subClass))
             return row.newName;
-    }
     return name;
 }
 
 std::string_view legacyPropertyName(std::string_view subClass, std::string_view name) {
-    for (const OldPropertyName& row : kOldPropertyNames) {
+    for (const OldPropertyName& row : kOldPropertyNames)
         if (row.written && row.subClass == subClass && row.newName == name)
             return row.oldName;
-    }
     return name;
 }
 

@@ -19,19 +19,23 @@ void writeValues(RecordSink& sink, std::string_view name, const Values& values, 
 } // namespace
 
 void writeIntegers(RecordSink& sink, std::string_view name, std::initializer_list<std::int32_t> values) {
-    writeValues(sink, name, values, [&](std::int32_t value) { sink.integer(value); });
+    writeValues(
+        sink, name, values, [&](std::int32_t value) { sink.integer(value); });
 }
 
 void writeLongs(RecordSink& sink, std::string_view name, std::initializer_list<std::int64_t> values) {
-    writeValues(sink, name, values, [&](std::int64_t value) { sink.longInteger(value); });
+    writeValues(
+        sink, name, values, [&](std::int64_t value) { sink.longInteger(value); });
 }
 
 void writeReals(RecordSink& sink, std::string_view name, std::initializer_list<double> values) {
-    writeValues(sink, name, values, [&](double value) { sink.real(value); });
+    writeValues(
+        sink, name, values, [&](double value) { sink.real(value); });
 }
 
 void writeTexts(RecordSink& sink, std::string_view name, std::initializer_list<std::string_view> values) {
-    writeValues(sink, name, values, [&](std::string_view value) { sink.text(value); });
+    writeValues(
+        sink, name, values, [&](std::string_view value) { sink.text(value); });
 }
 
 void writeInteger(RecordSink& sink, std::string_view name, std::int32_t value) { writeIntegers(sink, name, {value}); }

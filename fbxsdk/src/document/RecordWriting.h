@@ -53,9 +53,8 @@ public:
     BlockScope(const BlockScope&) = delete;
     BlockScope& operator=(const BlockScope&) = delete;
     ~BlockScope() noexcept(false) {
-        if (std::uncaught_exceptions() == mExceptions) {
+        if (std::uncaught_exceptions() == mExceptions)
             mSink.endRecord();
-        }
     }
 
 private:

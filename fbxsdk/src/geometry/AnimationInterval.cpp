@@ -38,10 +38,9 @@ private:
     void visitProperties(FbxObject& object) {
         // Only properties with a connection can be animated.
         for (const detail::PropertyData* property : object.data().properties()) {
-            for (const detail::ConnectionPoint* source : property->plug.sources) {
+            for (const detail::ConnectionPoint* source : property->plug.sources)
                 if (source->property < 0)
                     visitSource(*source->object);
-            }
         }
     }
 
@@ -60,9 +59,8 @@ private:
     void visitShapeChannels(FbxGeometry& geometry) {
         for (int b = 0; b < geometry.GetDeformerCount(FbxDeformer::eBlendShape); ++b) {
             auto* blendShape = static_cast<FbxBlendShape*>(geometry.GetDeformer(b, FbxDeformer::eBlendShape));
-            for (int c = 0; c < blendShape->GetBlendShapeChannelCount(); ++c) {
+            for (int c = 0; c < blendShape->GetBlendShapeChannelCount(); ++c)
                 visitProperties(*blendShape->GetBlendShapeChannel(c));
-            }
         }
     }
 

@@ -41,10 +41,9 @@ public:
             return;
         const std::size_t first = mArrays.size();
         add<double>(body.child("Vertices"));
-        for (const LayerElementRow& row : kLayerElements) {
+        for (const LayerElementRow& row : kLayerElements)
             if (row.type == LayerElementType::normal || row.type == LayerElementType::color)
                 addElement(body, row);
-        }
         addElement(body, coordinatesRow(*std::begin(kLayerChannels)));
         std::stable_sort(mArrays.begin() + static_cast<std::ptrdiff_t>(first), mArrays.end(),
                          [](const StoredArray* a, const StoredArray* b) { return sizeOf(a) > sizeOf(b); });

@@ -28,10 +28,9 @@ std::optional<FbxAMatrix> readMatrix(const Record& body, std::string_view name) 
     if (!record || !record->readNumbers(std::span<double>(numbers)))
         return std::nullopt;
     FbxAMatrix matrix;
-    for (std::size_t row = 0; row < 4; ++row) {
+    for (std::size_t row = 0; row < 4; ++row)
         for (std::size_t column = 0; column < 3; ++column)
             matrix[static_cast<int>(row)][static_cast<int>(column)] = numbers[4 * row + column];
-    }
     return matrix;
 }
 

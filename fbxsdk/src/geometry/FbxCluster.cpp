@@ -35,10 +35,9 @@ void FbxCluster::SetLink(const FbxNode* pNode) {
 
 void FbxCluster::SetAssociateModel(FbxNode* pNode) {
     FbxProperty property = FbxProperty::Create(this, FbxReferenceDT, kAssociateModel);
-    while (FbxNode* former = property.GetSrcObject<FbxNode>()) {
+    while (FbxNode* former = property.GetSrcObject<FbxNode>())
         if (!property.DisconnectSrcObject(former))
             break;
-    }
     if (pNode)
         property.ConnectSrcObject(pNode);
 }

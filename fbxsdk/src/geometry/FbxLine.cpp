@@ -54,10 +54,9 @@ int FbxLine::GetEndPointCount() const {
 int FbxLine::GetEndPointAt(int pEndPointIndex) const {
     ensureLoaded();
     int ends = 0;
-    for (int place = 0; place < mIndices.count(); ++place) {
+    for (int place = 0; place < mIndices.count(); ++place)
         if (mIndices[place] < 0 && ends++ == pEndPointIndex)
             return place;
-    }
     return -1;
 }
 

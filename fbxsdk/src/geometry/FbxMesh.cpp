@@ -140,10 +140,9 @@ int FbxMesh::RemovePolygon(int pPolygonIndex) {
 }
 
 bool FbxMesh::IsTriangleMesh() const {
-    for (int i = 0; i < GetPolygonCount(); ++i) {
+    for (int i = 0; i < GetPolygonCount(); ++i)
         if (GetPolygonSize(i) != 3)
             return false;
-    }
     return true;
 }
 

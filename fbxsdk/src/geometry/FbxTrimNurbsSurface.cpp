@@ -35,10 +35,9 @@ FbxTrimNurbsSurface::~FbxTrimNurbsSurface() = default;
 FbxNodeAttribute::EType FbxTrimNurbsSurface::GetAttributeType() const { return eTrimNurbsSurface; }
 
 void FbxTrimNurbsSurface::SetNurbsSurface(const FbxNurbsSurface* pNurbs) {
-    while (FbxNurbsSurface* former = GetNurbsSurface()) {
+    while (FbxNurbsSurface* former = GetNurbsSurface())
         if (!DisconnectSrcObject(former))
             break;
-    }
     // A connection changes both ends; the surface's content is unchanged.
     ConnectSrcObject(const_cast<FbxNurbsSurface*>(pNurbs));
 }

@@ -24,10 +24,9 @@ FbxVertexCacheDeformer::~FbxVertexCacheDeformer() = default;
 FbxDeformer::EDeformerType FbxVertexCacheDeformer::GetDeformerType() const { return eVertexCache; }
 
 void FbxVertexCacheDeformer::SetCache(FbxCache* pCache) {
-    while (FbxCache* former = GetCache()) {
+    while (FbxCache* former = GetCache())
         if (former == pCache || !DisconnectSrcObject(former))
             return;
-    }
     if (pCache)
         ConnectSrcObject(pCache);
 }

@@ -83,10 +83,9 @@ constexpr ElementClass kClasses[] = {
 };
 
 CreateElement creatorOf(int type) {
-    for (const ElementClass& row : kClasses) {
+    for (const ElementClass& row : kClasses)
         if (row.type == type)
             return row.create;
-    }
     return create<FbxLayerElementTexture>;
 }
 
@@ -96,10 +95,9 @@ struct ElementKind {
 };
 
 std::optional<ElementKind> kindOf(std::string_view record) {
-    for (const LayerElementRow& row : kLayerElements) {
+    for (const LayerElementRow& row : kLayerElements)
         if (row.record == record)
             return ElementKind{row, row.type};
-    }
     for (const LayerChannelRow& channel : kLayerChannels) {
         const LayerElementRow textures = texturesRow(channel);
         if (channel.coordinates == record)
@@ -136,21 +134,18 @@ public:
     LayerReader(FbxLayerContainer& container, const GeometrySource& source) : mContainer(container), mSource(source) {}
 
     void read() {
-        for (const Record& record : mSource.body->children()) {
+        for (const Record& record : mSource.body->children())
             if (record.name == "Layer")
                 ++mLayerLimit;
             else if (record.name.starts_with("LayerElement"))
                 readElement(record);
-        }
         mLayerLimit += static_cast<std::int64_t>(mElements.size());
-        for (const Record& record : mSource.body->children()) {
+        for (const Record& record : mSource.body->children())
             if (record.name == "Layer")
                 readLayer(record);
-        }
-        for (auto& [key, element] : mElements) {
+        for (auto& [key, element] : mElements)
             if (!element.placed)
                 placeUnnamed(element, key.second);
-        }
     }
 
 private:

@@ -53,10 +53,9 @@ std::vector<double> packed(DirectArray<Item> array, int begin, int end) {
     std::vector<double> numbers(static_cast<std::size_t>(array.GetCount()) * static_cast<std::size_t>(end - begin));
     const Item* const items = array.GetLocked();
     auto number = numbers.begin();
-    for (int i = 0; i < array.GetCount(); ++i) {
+    for (int i = 0; i < array.GetCount(); ++i)
         for (int component = begin; component < end; ++component)
             *number++ = items[i][component];
-    }
     return numbers;
 }
 
@@ -161,10 +160,9 @@ constexpr ElementWriter kWriters[] = {
 };
 
 WriteElement writerOf(int type) {
-    for (const ElementWriter& row : kWriters) {
+    for (const ElementWriter& row : kWriters)
         if (row.type == type)
             return row.write;
-    }
     return writeTextures;
 }
 

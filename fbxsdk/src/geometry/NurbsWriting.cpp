@@ -28,10 +28,9 @@ void writePoints(RecordSink& sink, const FbxGeometryBase& geometry, int componen
     const int count = geometry.GetControlPointsCount();
     const FbxVector4* const points = geometry.GetControlPoints();
     std::vector<double> numbers;
-    for (int i = 0; i < count; ++i) {
+    for (int i = 0; i < count; ++i)
         for (int component = 0; component < components; ++component)
             numbers.push_back(points[i][component]);
-    }
     writeArray<double>(sink, "Points", numbers);
 }
 

@@ -75,18 +75,16 @@ bool FbxIOPluginRegistry::DetectReaderFileFormat(const char* pFileName, int& pFi
 }
 
 int FbxIOPluginRegistry::FindWriterIDByDescription(const char* pDescription) const {
-    for (int i = 0; pDescription && i < GetWriterFormatCount(); ++i) {
+    for (int i = 0; pDescription && i < GetWriterFormatCount(); ++i)
         if (std::strcmp(kFormats[i].description, pDescription) == 0)
             return i;
-    }
     return -1;
 }
 
 int FbxIOPluginRegistry::FindWriterIDByExtension(const char* pExtension) const {
-    for (int i = 0; pExtension && i < GetWriterFormatCount(); ++i) {
+    for (int i = 0; pExtension && i < GetWriterFormatCount(); ++i)
         if (FbxString(kFormats[i].extension).CompareNoCase(pExtension) == 0)
             return i;
-    }
     return -1;
 }
 

@@ -37,10 +37,9 @@ constexpr KnownPath kKnownPaths[] = {
 
 /// The bit of a path; 0 for an unknown one.
 std::uint32_t bitOf(const char* name) {
-    for (std::size_t i = 0; name && i < std::size(kKnownPaths); ++i) {
+    for (std::size_t i = 0; name && i < std::size(kKnownPaths); ++i)
         if (std::strcmp(name, kKnownPaths[i].path) == 0)
             return std::uint32_t{1} << i;
-    }
     return 0;
 }
 

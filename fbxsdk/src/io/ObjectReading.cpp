@@ -143,10 +143,9 @@ const ClassReader kPropertyReaders[] = {
 
 void applyReaders(std::span<const ClassReader> readers, const Reading& reading) {
     const FbxClassId id = reading.object.GetClassId();
-    for (const ClassReader& reader : readers) {
+    for (const ClassReader& reader : readers)
         if (id.Is(reader.id))
             reader.read(reading);
-    }
 }
 
 /// Reads the properties of a document's objects, which have their indexes in the document.
@@ -171,10 +170,9 @@ private:
             return;
         }
         std::vector<TemplateLine> lines;
-        for (const DocumentTemplate& each : mDocument->templates) {
+        for (const DocumentTemplate& each : mDocument->templates)
             if (each.className == object.GetClassId().GetName())
                 readTemplate(object, each.properties, lines);
-        }
         mTemplates.emplace(info, std::move(lines));
     }
 
@@ -184,10 +182,12 @@ private:
 };
 
 bool sameText(std::string_view a, std::string_view b) {
-    return std::equal(a.begin(), a.end(), b.begin(), b.end(), [](char x, char y) {
-        const auto lower = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c; };
-        return lower(x) == lower(y);
-    });
+    return std::equal(
+        a.begin(), a.end(), b.begin(), b.end(),
+        [](char x, char y) {
+            const auto lower = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c; };
+            return lower(x) == lower(y);
+        });
 }
 
 /// A material's class follows from its shading model, in any case.

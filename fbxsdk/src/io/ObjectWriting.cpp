@@ -334,10 +334,9 @@ bool isView(const FbxNodeAttribute& attribute) {
     const FbxGlobalCameraSettings& settings = scene->GlobalCameraSettings();
     const bool listed = settings.IsProducerCamera(FbxCast<FbxCamera>(&attribute)) ||
                         &attribute == static_cast<const FbxNodeAttribute*>(settings.GetCameraSwitcher());
-    for (int i = 0; listed && i < attribute.GetNodeCount(); ++i) {
+    for (int i = 0; listed && i < attribute.GetNodeCount(); ++i)
         if (attribute.GetNode(i)->GetParent())
             return false;
-    }
     return listed;
 }
 
@@ -367,10 +366,9 @@ WrittenSpan writtenSpan(const FbxTimeSpan& span, const FbxAnimStack& stack) {
         return stated;
     FbxTimeSpan keys;
     bool found = false;
-    for (const FbxAnimLayer* layer : sourcesOf<FbxAnimLayer>(stack)) {
+    for (const FbxAnimLayer* layer : sourcesOf<FbxAnimLayer>(stack))
         for (const FbxAnimCurveNode* node : sourcesOf<FbxAnimCurveNode>(*layer))
             widen(keys, found, *node);
-    }
     if (!found)
         return {0, kTicksPerSecond};
     return {keys.GetStart().Get(), keys.GetStop().Get()};

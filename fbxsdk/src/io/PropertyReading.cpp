@@ -67,10 +67,9 @@ bool isDefault(const FbxObject& object, int index, const DocumentProperty& line)
     const PropertyRow& row = rows[static_cast<std::size_t>(index)];
     if (row.type->GetType() == eFbxString || line.flags != row.flags)
         return false;
-    for (std::size_t i = 0; i < std::min<std::size_t>(line.values.size(), 4); ++i) {
+    for (std::size_t i = 0; i < std::min<std::size_t>(line.values.size(), 4); ++i)
         if (line.values[i].toReal() != row.numbers[i])
             return false;
-    }
     return true;
 }
 

@@ -45,10 +45,12 @@ const FbxAnimCurveNode* curveNodeOf(const ConnectionPoint& source) {
 }
 
 bool isAnimated(const PropertyData& property) {
-    return std::any_of(property.plug.sources.begin(), property.plug.sources.end(), [](const ConnectionPoint* source) {
-        const FbxAnimCurveNode* node = curveNodeOf(*source);
-        return node && !isIdle(*node);
-    });
+    return std::any_of(
+        property.plug.sources.begin(), property.plug.sources.end(),
+        [](const ConnectionPoint* source) {
+            const FbxAnimCurveNode* node = curveNodeOf(*source);
+            return node && !isIdle(*node);
+        });
 }
 
 /// Whether the file has connections to or from the property.

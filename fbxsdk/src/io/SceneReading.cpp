@@ -65,11 +65,10 @@ public:
             return;
         if (connectCurve(*source, *destination, connection))
             return;
-        if (connection.destinationProperty.empty()) {
+        if (connection.destinationProperty.empty())
             connectToObject(*source, *destination, connection);
-        } else {
+        else
             connectToProperty(*source, *destination, connection);
-        }
     }
 
 private:
@@ -102,24 +101,22 @@ private:
     }
 
     static void connectToObject(FbxObject& source, FbxObject& destination, const DocumentConnection& connection) {
-        if (!connection.sourceProperty.empty()) {
+        if (!connection.sourceProperty.empty())
             destination.ConnectSrcProperty(source.FindProperty(std::string(connection.sourceProperty).c_str()));
-        } else if (auto* child = FbxCast<FbxNode>(&source); child && destination.Is<FbxNode>()) {
+        else if (auto* child = FbxCast<FbxNode>(&source); child && destination.Is<FbxNode>())
             static_cast<FbxNode&>(destination).AddChild(child);
-        } else {
+        else
             destination.ConnectSrcObject(&source);
-        }
     }
 
     static void connectToProperty(FbxObject& source, FbxObject& destination, const DocumentConnection& connection) {
         FbxProperty property = destination.FindProperty(std::string(connection.destinationProperty).c_str());
         if (!property.IsValid())
             return;
-        if (connection.sourceProperty.empty()) {
+        if (connection.sourceProperty.empty())
             property.ConnectSrcObject(&source);
-        } else {
+        else
             property.ConnectSrcProperty(source.FindProperty(std::string(connection.sourceProperty).c_str()));
-        }
     }
 
     const Document& mDocument;

@@ -101,10 +101,9 @@ public:
 
     void write(const std::vector<ChosenObject>& objects) {
         const FbxNode& root = *mScene.GetRootNode();
-        for (const ConnectionPoint* source : root.data().plug.sources) {
+        for (const ConnectionPoint* source : root.data().plug.sources)
             if (source->property < 0 && source->object->Is<FbxNode>())
                 add(kHierarchy, idOf(*source->object), 0);
-        }
         for (const ChosenObject& chosen : objects)
             writeSources(*chosen.object);
         std::stable_sort(mRanked.begin(), mRanked.end(),
@@ -130,14 +129,12 @@ private:
 
     void writeSources(const FbxObject& destination) {
         const std::int64_t id = idOf(destination);
-        for (const ConnectionPoint* source : destination.data().plug.sources) {
+        for (const ConnectionPoint* source : destination.data().plug.sources)
             if (!source->object->Is<FbxAnimCurve>() || !destination.Is<FbxAnimCurveNode>())
                 add(rankOf(*source->object, destination), idOf(*source->object), id, nameOf(*source));
-        }
-        for (const PropertyData* property : destination.data().properties()) {
+        for (const PropertyData* property : destination.data().properties())
             for (const ConnectionPoint* source : property->plug.sources)
                 add(kOthers, idOf(*source->object), id, nameOf(*source), propertyName(destination, property->index));
-        }
         if (const auto* node = FbxCast<FbxAnimCurveNode>(&destination))
             writeChannels(*node, id);
     }

@@ -80,19 +80,17 @@ std::span<const SchemaClass> schemaClasses() { return kClasses; }
 
 const SchemaClass* findSchema(std::string_view record, std::string_view subClass) {
     // A row for any sub-class follows those of its record that name one.
-    for (const SchemaClass& row : kClasses) {
+    for (const SchemaClass& row : kClasses)
         if (row.record == record && (row.subClass == subClass || row.subClass == kAny))
             return &row;
-    }
     return nullptr;
 }
 
 const SchemaClass* findSchema(const FbxClassId& id) {
     for (FbxClassId each = id; each.IsValid(); each = each.GetParent()) {
-        for (const SchemaClass& row : kClasses) {
+        for (const SchemaClass& row : kClasses)
             if (row.classId() == each)
                 return &row;
-        }
     }
     return nullptr;
 }

@@ -90,10 +90,9 @@ bool ConnectionList::remove(const ConnectionPoint& point) {
 std::size_t ConnectionList::placeOf(const ConnectionPoint& point) {
     const std::size_t count = mPoints.size();
     for (std::size_t near = 0; !mRemoval && near < std::min(kNear, count); ++near) {
-        for (const std::size_t index : {count - 1 - near, near}) {
+        for (const std::size_t index : {count - 1 - near, near})
             if (mPoints[index] == &point)
                 return index;
-        }
     }
     if (!mRemoval && count > kNear && !beginRemoval())
         return static_cast<std::size_t>(std::find(mPoints.begin(), mPoints.end(), &point) - mPoints.begin());
@@ -155,10 +154,9 @@ ConnectionPoint* ConnectionList::at(const FbxCriteria* criteria, int index) cons
         const auto place = static_cast<std::size_t>(index);
         return place < selection->found.size() ? selection->found[place] : nullptr;
     }
-    for (ConnectionPoint* point : mPoints) {
+    for (ConnectionPoint* point : mPoints)
         if (isSelected(*point, criteria) && index-- == 0)
             return point;
-    }
     return nullptr;
 }
 

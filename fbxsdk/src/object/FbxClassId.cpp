@@ -9,10 +9,9 @@ FBXSDK_NAMESPACE_BEGIN
 bool FbxClassId::Is(const FbxClassId& pId) const {
     if (!pId.mInfo)
         return false;
-    for (const detail::ClassInfo* each = mInfo; each; each = each->parent) {
+    for (const detail::ClassInfo* each = mInfo; each; each = each->parent)
         if (each == pId.mInfo)
             return true;
-    }
     return false;
 }
 

@@ -63,10 +63,9 @@ void FbxObject::Destroy(bool pRecursive) {
     for (std::size_t i = 0; i < doomed.size(); ++i) { // NOLINT(modernize-loop-convert): the list grows
         // A scene frees its members as well, and its members are its sources.
         const FbxScene* scene = detail::isScene(*doomed[i]) ? doomed[i]->GetScene() : nullptr;
-        for (const detail::ConnectionPoint* source : doomed[i]->mData->plug.sources) {
+        for (const detail::ConnectionPoint* source : doomed[i]->mData->plug.sources)
             if (source->property < 0 && (pRecursive || (scene && source->object->GetScene() == scene)))
                 doom(*source->object);
-        }
     }
     detail::ManagerData::destroyTogether(doomed);
 }

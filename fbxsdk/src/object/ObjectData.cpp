@@ -47,7 +47,8 @@ int ClassInfo::findRow(const NameKey& rowName) const {
         // Several threads may be here at once: one of their tables stays.
         std::unique_ptr<const NameIndex> made;
         try {
-            made = std::make_unique<NameIndex>(rows, [](const PropertyRow& row) { return row.name; });
+            made = std::make_unique<NameIndex>(
+                rows, [](const PropertyRow& row) { return row.name; });
         } catch (const std::bad_alloc&) {
             return rowIndex(rows, rowName.text);
         }
@@ -94,23 +95,20 @@ int ObjectData::findProperty(const NameKey& propertyName) const {
         const auto found = mDynamicIndex->find(propertyName.text);
         return found == mDynamicIndex->end() ? -1 : found->second;
     }
-    for (const PropertyData* property : mDynamicProperties) {
+    for (const PropertyData* property : mDynamicProperties)
         if (property->name == propertyName.text)
             return property->index;
-    }
     return -1;
 }
 
 int ObjectData::findPropertyInAnyCase(std::string_view propertyName) const {
-    for (std::size_t i = 0; i < info->rows.size(); ++i) {
+    for (std::size_t i = 0; i < info->rows.size(); ++i)
         if (equalInAnyCase(info->rows[i].name, propertyName))
             return static_cast<int>(i);
-    }
     readUnread();
-    for (const PropertyData* property : mDynamicProperties) {
+    for (const PropertyData* property : mDynamicProperties)
         if (equalInAnyCase(property->name, propertyName))
             return property->index;
-    }
     return -1;
 }
 
@@ -296,15 +294,13 @@ void ObjectData::disconnectFromSurvivors() {
     const auto cut = [](ConnectionPoint& point) {
         // In reverse order of connection, over copies: disconnecting changes the lists.
         const auto sources = point.sources.all();
-        for (auto each = sources.rbegin(); each != sources.rend(); ++each) {
+        for (auto each = sources.rbegin(); each != sources.rend(); ++each)
             if (!(*each)->object->data().doomed)
                 disconnect(**each, point);
-        }
         const auto destinations = point.destinations.all();
-        for (auto each = destinations.rbegin(); each != destinations.rend(); ++each) {
+        for (auto each = destinations.rbegin(); each != destinations.rend(); ++each)
             if (!(*each)->object->data().doomed)
                 disconnect(point, **each);
-        }
     };
     eachPlug(cut);
 }

@@ -119,20 +119,21 @@ Integer nearest(Wide number) {
 
 template <class Integer>
 Integer nearest(double number) {
-    if constexpr (std::is_same_v<Integer, bool>) {
+    if constexpr (std::is_same_v<Integer, bool>)
         return number != 0.0 && !std::isnan(number);
-    } else {
+    else
         return nearest<Integer>(toWide(number));
-    }
 }
 
 /// Stores a number, whole or real, in a caller's variable of a type of whole numbers.
 template <class Number>
 void storeWhole(Number number, void* target, EFbxType type) {
-    withWholeType(type, [&](auto sample) {
-        using Integer = decltype(sample);
-        *static_cast<Integer*>(target) = nearest<Integer>(number);
-    });
+    withWholeType(
+        type,
+        [&](auto sample) {
+            using Integer = decltype(sample);
+            *static_cast<Integer*>(target) = nearest<Integer>(number);
+        });
 }
 
 Wide loadWhole(const void* source, EFbxType type) {
@@ -154,11 +155,10 @@ Wide keptWhole(const PropertyValue& value, EFbxType type) {
 }
 
 void storeReal(double number, void* target, EFbxType type) {
-    if (type == eFbxFloat) {
+    if (type == eFbxFloat)
         *static_cast<float*>(target) = static_cast<float>(number);
-    } else {
+    else
         *static_cast<double*>(target) = number;
-    }
 }
 
 /// Stores the first `count` numbers in a caller's variable of numbers.

@@ -14,10 +14,9 @@ namespace detail {
 template <class T>
 std::vector<T*> objectsIn(const ConnectionList& points) {
     std::vector<T*> found;
-    for (const ConnectionPoint* point : points) {
+    for (const ConnectionPoint* point : points)
         if (point->property < 0 && point->object->Is<T>())
             found.push_back(static_cast<T*>(point->object));
-    }
     return found;
 }
 

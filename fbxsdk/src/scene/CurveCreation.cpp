@@ -36,10 +36,9 @@ const char* curveNodeName(const char* propertyName) {
         std::string_view property;
         const char* node;
     } kNames[] = {{"Lcl Translation", "T"}, {"Lcl Rotation", "R"}, {"Lcl Scaling", "S"}};
-    for (const auto& row : kNames) {
+    for (const auto& row : kNames)
         if (row.property == propertyName)
             return row.node;
-    }
     return propertyName;
 }
 

@@ -16,10 +16,9 @@ namespace {
 FbxCamera* cameraAt(const FbxProperty& property) { return property.GetSrcObject<FbxCamera>(); }
 
 void setCamera(FbxProperty property, FbxCamera* camera) {
-    while (FbxCamera* former = cameraAt(property)) {
+    while (FbxCamera* former = cameraAt(property))
         if (!property.DisconnectSrcObject(former))
             break;
-    }
     if (camera)
         property.ConnectSrcObject(camera);
 }

@@ -67,17 +67,17 @@ FbxCamera* makeProducerCamera(FbxScene& scene, const ProducerRow& row) {
 
 bool isFixedName(const char* name) {
     return std::strcmp(name, detail::kCameraSwitcherName) == 0 ||
-           std::any_of(std::begin(kProducerCameras), std::end(kProducerCameras),
-                       [&](const ProducerRow& row) { return std::strcmp(row.name, name) == 0; });
+           std::any_of(
+               std::begin(kProducerCameras), std::end(kProducerCameras),
+               [&](const ProducerRow& row) { return std::strcmp(row.name, name) == 0; });
 }
 
 /// Several nodes may have the name; one of them being a camera is enough.
 bool hasCamera(FbxNode& root, const char* name) {
     detail::NodesBelow<FbxNode> below(root);
-    while (FbxNode* node = below.next()) {
+    while (FbxNode* node = below.next())
         if (std::strcmp(node->GetName(), name) == 0 && node->GetCamera())
             return true;
-    }
     return false;
 }
 
@@ -101,10 +101,9 @@ const char* FbxGlobalCameraSettings::GetDefaultCamera() const {
 }
 
 void FbxGlobalCameraSettings::CreateProducerCameras() {
-    for (std::size_t i = 0; i < mCameras.size(); ++i) {
+    for (std::size_t i = 0; i < mCameras.size(); ++i)
         if (!mCameras[i])
             mCameras[i] = makeProducerCamera(*mScene, kProducerCameras[i]);
-    }
     if (mSwitcher)
         return;
     mSwitcher = FbxCameraSwitcher::Create(mScene, detail::kCameraSwitcherName);
@@ -128,10 +127,9 @@ void FbxGlobalCameraSettings::DestroyProducerCameras() {
 }
 
 void FbxGlobalCameraSettings::forget(const FbxObject& pObject) {
-    for (FbxCamera*& camera : mCameras) {
+    for (FbxCamera*& camera : mCameras)
         if (static_cast<const FbxObject*>(camera) == &pObject)
             camera = nullptr;
-    }
     if (static_cast<const FbxObject*>(mSwitcher) == &pObject)
         mSwitcher = nullptr;
 }

@@ -72,18 +72,16 @@ void keepInStep(std::vector<T*>& objects, FbxObject& source, bool connected) {
     T* object = FbxCast<T>(&source);
     if (!object)
         return;
-    if (connected) {
+    if (connected)
         objects.push_back(object);
-    } else {
+    else
         takeOut(objects, object);
-    }
 }
 
 void setOnlyNode(FbxProperty property, FbxNode* node) {
-    while (auto* former = property.GetSrcObject<FbxNode>()) {
+    while (auto* former = property.GetSrcObject<FbxNode>())
         if (!property.DisconnectSrcObject(former))
             break;
-    }
     if (node)
         property.ConnectSrcObject(node);
 }
@@ -177,10 +175,9 @@ FbxNode* FbxNode::FindChild(const char* pName, bool pRecursive, bool) {
         return found == mChildren.end() ? nullptr : *found;
     }
     detail::NodesBelow<FbxNode> below(*this);
-    while (FbxNode* node = below.next()) {
+    while (FbxNode* node = below.next())
         if (node->GetName() == name)
             return node;
-    }
     return nullptr;
 }
 

@@ -16,10 +16,9 @@ bool isStated(const FbxProperty& property) {
 
 std::vector<FbxObject*> objectsOf(const FbxScene& scene) {
     std::vector<FbxObject*> objects;
-    for (const detail::ConnectionPoint* point : scene.data().plug.sources) {
+    for (const detail::ConnectionPoint* point : scene.data().plug.sources)
         if (point->property < 0)
             objects.push_back(point->object);
-    }
     return objects;
 }
 

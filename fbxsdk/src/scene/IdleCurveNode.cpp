@@ -15,10 +15,9 @@ namespace detail {
 namespace {
 
 bool hasCurves(const FbxAnimCurveNode& node) {
-    for (unsigned int channel = 0; channel < node.GetChannelsCount(); ++channel) {
+    for (unsigned int channel = 0; channel < node.GetChannelsCount(); ++channel)
         if (node.GetCurveCount(channel) > 0)
             return true;
-    }
     return false;
 }
 
@@ -31,10 +30,9 @@ bool isOnBaseLayer(const FbxAnimCurveNode& node) {
 bool hasValueOf(const FbxAnimCurveNode& node, const FbxProperty& property) {
     const FbxDouble4 value = property.Get<FbxDouble4>();
     const unsigned int count = std::min(node.GetChannelsCount(), 4U);
-    for (unsigned int channel = 0; channel < count; ++channel) {
+    for (unsigned int channel = 0; channel < count; ++channel)
         if (node.channelValue(channel) != value[static_cast<int>(channel)])
             return false;
-    }
     return true;
 }
 

@@ -26,17 +26,17 @@ bool states(const DocumentObject& object, std::string_view start, std::string_vi
 }
 
 bool states(std::span<const DocumentProperty> settings, std::string_view name) {
-    return std::any_of(settings.begin(), settings.end(), [&](const auto& line) { return line.name == name; });
+    return std::any_of(
+        settings.begin(), settings.end(), [&](const auto& line) { return line.name == name; });
 }
 
 template <class Visit>
 void eachCurve(const FbxAnimStack& stack, Visit&& visit) {
     for (const FbxAnimLayer* layer : sourcesOf<FbxAnimLayer>(stack)) {
         for (const FbxAnimCurveNode* node : sourcesOf<FbxAnimCurveNode>(*layer)) {
-            for (unsigned int channel = 0; channel < node->GetChannelsCount(); ++channel) {
+            for (unsigned int channel = 0; channel < node->GetChannelsCount(); ++channel)
                 if (const FbxAnimCurve* curve = node->GetCurve(channel))
                     visit(curve->keys());
-            }
         }
     }
 }
@@ -75,10 +75,9 @@ void fillSpan(const Document& document, const DocumentObject& source, FbxAnimSta
 /// The document's stacks with their objects in the file, in the order of the file.
 template <class Visit>
 void eachStack(const Document& document, const std::vector<FbxObject*>& objects, Visit&& visit) {
-    for (std::size_t i = 0; i < document.objects.size(); ++i) {
+    for (std::size_t i = 0; i < document.objects.size(); ++i)
         if (auto* stack = FbxCast<FbxAnimStack>(objects[i]))
             visit(document.objects[i], *stack);
-    }
 }
 
 void sortOut(std::vector<std::int64_t>& times) {
@@ -112,8 +111,9 @@ std::string rateText(double rate) {
 } // namespace
 
 void fillStackSpans(const Document& document, const std::vector<FbxObject*>& objects, FbxScene& scene) {
-    eachStack(document, objects,
-              [&](const DocumentObject& source, FbxAnimStack& stack) { fillSpan(document, source, stack, scene); });
+    eachStack(
+        document, objects,
+        [&](const DocumentObject& source, FbxAnimStack& stack) { fillSpan(document, source, stack, scene); });
 }
 
 std::string fillFrameRate(const Document& document, const std::vector<FbxObject*>& objects, FbxScene& scene) {

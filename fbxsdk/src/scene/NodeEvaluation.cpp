@@ -43,10 +43,9 @@ constexpr Linear kIdentity = {{{1, 0, 0}, {0, 1, 0}, {0, 0, 1}}};
 /// result.
 inline Linear operator*(const Linear& a, const Linear& b) {
     Linear result;
-    for (std::size_t i = 0; i < 3; ++i) {
+    for (std::size_t i = 0; i < 3; ++i)
         for (std::size_t j = 0; j < 3; ++j)
             result[i][j] = a[0][j] * b[i][0] + a[1][j] * b[i][1] + a[2][j] * b[i][2] + 0.0;
-    }
     return result;
 }
 
@@ -59,19 +58,17 @@ inline Vector3 imageOf(const Linear& m, const Vector3& translation, const Vector
 
 inline Linear transposed(const Linear& m) {
     Linear result;
-    for (std::size_t i = 0; i < 3; ++i) {
+    for (std::size_t i = 0; i < 3; ++i)
         for (std::size_t j = 0; j < 3; ++j)
             result[i][j] = m[j][i];
-    }
     return result;
 }
 
 /// Scales first, along the axes from which the matrix comes.
 inline Linear scaled(Linear m, const Vector3& scaling) {
-    for (std::size_t i = 0; i < 3; ++i) {
+    for (std::size_t i = 0; i < 3; ++i)
         for (double& element : m[i])
             element *= scaling[i];
-    }
     return m;
 }
 
@@ -354,10 +351,9 @@ void TransformCache::grow() {
     std::vector<Entry> old = std::move(mEntries);
     mEntries.clear();
     mEntries.resize(old.size() * 2);
-    for (const Entry& entry : old) {
+    for (const Entry& entry : old)
         if (isOurs(entry))
             placeOf(entry.number) = entry;
-    }
 }
 
 void TransformCache::reset(TransformCache&& memory, std::uint32_t generation) {

@@ -88,11 +88,10 @@ const FbxVector4& FbxNode::pivotVector(EPivotSet set, detail::PivotVector which)
 void FbxNode::setPivotVector(EPivotSet set, detail::PivotVector which, const FbxVector4& vector) {
     const std::size_t place = placeOf(which);
     const FbxDouble3 value(vector[0], vector[1], vector[2]);
-    if (set == eDestinationPivot) {
+    if (set == eDestinationPivot)
         destinationPivots().vectors[place] = value;
-    } else {
+    else
         propertyOf(*this, pivotRows().vectors[place]).Set(value);
-    }
 }
 
 void FbxNode::SetPreRotation(EPivotSet pPivotSet, FbxVector4 pVector) {
@@ -168,11 +167,10 @@ FbxVector4 FbxNode::GetGeometricScaling(EPivotSet pPivotSet) const {
 }
 
 void FbxNode::SetRotationOrder(EPivotSet pPivotSet, EFbxRotationOrder pRotationOrder) {
-    if (pPivotSet == eDestinationPivot) {
+    if (pPivotSet == eDestinationPivot)
         destinationPivots().rotationOrder = pRotationOrder;
-    } else {
+    else
         propertyOf(*this, pivotRows().rotationOrder).Set(pRotationOrder);
-    }
 }
 
 void FbxNode::GetRotationOrder(EPivotSet pPivotSet, EFbxRotationOrder& pRotationOrder) const {
@@ -189,17 +187,15 @@ void FbxNode::SetRotationActive(bool pVal) { propertyOf(*this, pivotRows().rotat
 bool FbxNode::GetRotationActive() const { return propertyOf(*this, pivotRows().rotationActive).Get<FbxBool>(); }
 
 void FbxNode::SetRotationSpaceForLimitOnly(EPivotSet pPivotSet, bool pUseForLimitOnly) {
-    if (pPivotSet == eDestinationPivot) {
+    if (pPivotSet == eDestinationPivot)
         destinationPivots().rotationSpaceForLimitOnly = pUseForLimitOnly;
-    } else {
+    else
         propertyOf(*this, pivotRows().rotationSpaceForLimitOnly).Set(pUseForLimitOnly);
-    }
 }
 
 bool FbxNode::GetRotationSpaceForLimitOnly(EPivotSet pPivotSet) const {
-    if (pPivotSet == eDestinationPivot) {
+    if (pPivotSet == eDestinationPivot)
         return mPivots && mPivots->destination && mPivots->destination->rotationSpaceForLimitOnly;
-    }
     return propertyOf(*this, pivotRows().rotationSpaceForLimitOnly).Get<FbxBool>();
 }
 

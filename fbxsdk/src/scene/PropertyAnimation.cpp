@@ -33,10 +33,9 @@ int channelOf(const FbxAnimCurveNode& node, const char* channel) {
     if (index >= 0)
         return index;
     constexpr const char* kAliases[][2] = {{"X", "R"}, {"Y", "G"}, {"Z", "B"}};
-    for (const auto& alias : kAliases) {
+    for (const auto& alias : kAliases)
         if (std::strcmp(channel, alias[0]) == 0)
             return node.GetChannelIndex(alias[1]);
-    }
     return -1;
 }
 
@@ -83,10 +82,9 @@ FbxAnimCurveNode* FbxProperty::GetCurveNode(FbxAnimStack* pAnimStack, bool pCrea
 FbxAnimCurveNode* FbxProperty::GetCurveNode(FbxAnimLayer* pAnimLayer, bool pCreate) {
     if (!IsValid() || !pAnimLayer)
         return nullptr;
-    for (FbxAnimCurveNode* node : detail::sourcesOf<FbxAnimCurveNode>(*this)) {
+    for (FbxAnimCurveNode* node : detail::sourcesOf<FbxAnimCurveNode>(*this))
         if (node->IsConnectedDstObject(pAnimLayer))
             return node;
-    }
     return pCreate ? pAnimLayer->CreateCurveNode(*this) : nullptr;
 }
 

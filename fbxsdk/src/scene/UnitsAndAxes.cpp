@@ -84,9 +84,8 @@ FbxAxisSystem::EFrontVector FbxAxisSystem::GetFrontVector(int& pSign) const {
 
 FbxAxisSystem FbxAxisSystem::fromAxes(int pUp, int pUpSign, int pFront, int pFrontSign, int pCoord, int pCoordSign) {
     const auto isAxis = [](int axis) { return axis >= 0 && axis <= 2; };
-    if (!isAxis(pUp) || !isAxis(pFront) || !isAxis(pCoord) || pUp == pFront || pUp == pCoord || pFront == pCoord) {
+    if (!isAxis(pUp) || !isAxis(pFront) || !isAxis(pCoord) || pUp == pFront || pUp == pCoord || pFront == pCoord)
         return {};
-    }
     FbxAxisSystem system;
     system.mUp = signOf(pUpSign) * (pUp + 1);
     system.mFront = signOf(pFrontSign) * (kOthers[pUp][0] == pFront ? eParityEven : eParityOdd);

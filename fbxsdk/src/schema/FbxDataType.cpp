@@ -128,16 +128,14 @@ int firstOfType(std::string_view typeName) {
 FbxDataType dataTypeOf(std::string_view typeName, std::string_view subTypeName) {
     const int first = firstOfType(typeName);
     if (first >= 0) {
-        for (const PropertyTypeInfo& row : std::span(kTypes).subspan(static_cast<std::size_t>(first))) {
+        for (const PropertyTypeInfo& row : std::span(kTypes).subspan(static_cast<std::size_t>(first)))
             if (typeName == row.typeName && subTypeName == row.subTypeName)
                 return FbxDataType(&row);
-        }
         return FbxDataType(&kTypes[first]);
     }
-    for (const Spelling& spelling : kSpellings) {
+    for (const Spelling& spelling : kSpellings)
         if (typeName == spelling.typeName)
             return *spelling.type;
-    }
     return FbxBlobDT;
 }
 

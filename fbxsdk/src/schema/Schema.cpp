@@ -18,10 +18,9 @@ constinit const FbxDataType kAnimatableBoolType{&kAnimatableBoolInfo};
 constinit const FbxDataType kAnimatableIntType{&kAnimatableIntInfo};
 
 int rowIndex(std::span<const PropertyRow> rows, std::string_view name) {
-    for (std::size_t i = 0; i < rows.size(); ++i) {
+    for (std::size_t i = 0; i < rows.size(); ++i)
         if (name == rows[i].name)
             return static_cast<int>(i);
-    }
     return -1;
 }
 

@@ -52,10 +52,9 @@ inline constexpr const VersionTraits& kNewestVersion = kVersionTraits[5];
 
 /// The row of that name; null when there is none.
 [[nodiscard]] constexpr const VersionTraits* findVersion(std::string_view name) {
-    for (const VersionTraits& row : kVersionTraits) {
+    for (const VersionTraits& row : kVersionTraits)
         if (name == row.name)
             return &row;
-    }
     return nullptr;
 }
 

@@ -51,19 +51,17 @@ Explanations::Explanations(const std::filesystem::path& path, const std::string&
 
 bool Explanations::explain(const std::string& deviation) {
     bool explained = false;
-    for (Pattern& pattern : mPatterns) {
+    for (Pattern& pattern : mPatterns)
         if (matches(pattern.text, deviation))
             explained = pattern.used = true;
-    }
     return explained;
 }
 
 std::vector<std::string> Explanations::unused() const {
     std::vector<std::string> texts;
-    for (const Pattern& pattern : mPatterns) {
+    for (const Pattern& pattern : mPatterns)
         if (!pattern.used)
             texts.push_back(pattern.text);
-    }
     return texts;
 }
 

@@ -89,10 +89,9 @@ public:
     Comparison(const Structure& ours, const Structure& theirs) : mOurs(ours), mTheirs(theirs) {}
 
     std::vector<std::string> run() {
-        for (const auto& [path, place] : mOurs.places()) {
+        for (const auto& [path, place] : mOurs.places())
             if (const Place* their = mTheirs.find(path))
                 compare(path, place, *their);
-        }
         return mFound;
     }
 
@@ -107,17 +106,15 @@ private:
         const bool lists = path.find("/Property ") == std::string::npos && (holdsLists(their) || holdsLists(our));
         const std::set<std::string> ourWays = lists ? neighbours(our) : our.codes;
         const std::set<std::string> theirWays = lists ? neighbours(their) : their.codes;
-        for (const std::string& way : ourWays) {
+        for (const std::string& way : ourWays)
             if (!theirWays.contains(way))
                 mFound.push_back("stored otherwise: " + path + " as '" + way + "', not '" + *theirWays.begin() + "'");
-        }
     }
 
     void compareChildren(const std::string& path, const Place& our, const Place& their) {
-        for (const auto& [kind, count] : our.children) {
+        for (const auto& [kind, count] : our.children)
             if (!their.children.contains(kind))
                 mFound.push_back("nowhere else: " + path + '/' + kind);
-        }
         constexpr std::size_t kEnoughFiles = 2; // a single one may be an exception
         for (const auto& [kind, count] : their.children) {
             const auto written = our.children.find(kind);

@@ -39,10 +39,9 @@ std::unique_ptr<fbxsdk::detail::RecordTree> readFile(const std::filesystem::path
 std::uint32_t versionOf(const WrittenForm& form) {
     constexpr std::pair<std::string_view, std::uint32_t> kVersions[] = {
         {"FBX201000", 6100}, {"FBX201400", 7400}, {"FBX201600", 7500}};
-    for (const auto& [name, version] : kVersions) {
+    for (const auto& [name, version] : kVersions)
         if (name == form.version)
             return version;
-    }
     throw std::runtime_error("nothing to compare with for " + form.version);
 }
 

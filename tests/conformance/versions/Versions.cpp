@@ -47,10 +47,9 @@ struct SceneFacts {
 };
 
 void appendMatrix(const FbxAMatrix& matrix, Numbers& numbers) {
-    for (int row = 0; row < 4; ++row) {
+    for (int row = 0; row < 4; ++row)
         for (int column = 0; column < 3; ++column)
             numbers.push_back(matrix.Get(row, column));
-    }
 }
 
 /// The mean, the minimum and the maximum coordinate of the deformed points; programs may renumber points.
@@ -142,17 +141,17 @@ bool same(const Numbers& a, const Numbers& b) {
 }
 
 bool same(const std::vector<Numbers>& a, const std::vector<Numbers>& b) {
-    return std::equal(a.begin(), a.end(), b.begin(), b.end(), [](const auto& x, const auto& y) { return same(x, y); });
+    return std::equal(
+        a.begin(), a.end(), b.begin(), b.end(), [](const auto& x, const auto& y) { return same(x, y); });
 }
 
 /// The first difference; empty when the scenes agree.
 std::string difference(const SceneFacts& facts, const SceneFacts& newest) {
     if (!same(facts.span, newest.span))
         return "the spans of the first stacks differ";
-    for (const auto& [name, node] : newest.nodes) {
+    for (const auto& [name, node] : newest.nodes)
         if (facts.nodes.count(name) == 0)
             return "has no node " + name;
-    }
     for (const auto& [name, node] : facts.nodes) {
         const auto found = newest.nodes.find(name);
         if (found == newest.nodes.end())
@@ -182,10 +181,9 @@ public:
     explicit Comparison(const char* reasonsFile) {
         nlohmann::json reasons;
         std::ifstream(reasonsFile) >> reasons;
-        for (const auto& entry : reasons) {
+        for (const auto& entry : reasons)
             for (const auto& file : entry.at("files"))
                 mReasons[file.get<std::string>()] = entry.at("reason").get<std::string>();
-        }
     }
 
     void compareScene(const std::map<std::string, const CorpusFile*>& versions) {
@@ -232,15 +230,13 @@ int run() {
     }
     const std::vector<CorpusFile> files = listCorpus(*folder);
     std::map<std::string, std::map<std::string, const CorpusFile*>> scenes;
-    for (const CorpusFile& file : files) {
+    for (const CorpusFile& file : files)
         if (const auto parts = partsOf(file.name))
             scenes[parts->first][parts->second] = &file;
-    }
     Comparison comparison(TARNELL_CONFORMANCE_VERSIONS);
-    for (const auto& [scene, versions] : scenes) {
+    for (const auto& [scene, versions] : scenes)
         if (versions.size() > 1)
             comparison.compareScene(versions);
-    }
     return comparison.finish();
 }
 

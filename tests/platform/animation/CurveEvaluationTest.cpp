@@ -143,9 +143,8 @@ TEST(CurveEvaluation, IsTheHermiteCubicOfUserSlopes) {
 TEST(CurveEvaluation, IsTheHermiteCubicAlsoWithWeightsOfAThird) {
     const CurveKeys plain = curveOf({{0.0, 3.0F, kUser, 4.0F, -6.0F}, {2.0, 5.0F, kUser}});
     const CurveKeys weighted = curveOf({{0.0, 3.0F, kUser | kWeighted, 4.0F, -6.0F}, {2.0, 5.0F, kUser}});
-    for (double seconds = 0.0; seconds <= 2.0; seconds += 0.01) {
+    for (double seconds = 0.0; seconds <= 2.0; seconds += 0.01)
         EXPECT_NEAR(at(weighted, seconds), at(plain, seconds), 1.0e-6) << seconds;
-    }
 }
 
 TEST(CurveEvaluation, IsTheBezierCurveOfWeightedSlopes) {
@@ -177,9 +176,8 @@ TEST(CurveEvaluation, UsesAThirdOnTheSideThatIsNotWeighted) {
     reference.data3 = kThird;
     const CurveKeys curve = curveOf({start, {1.0, 1.0F, kUser}});
     const CurveKeys expected = curveOf({reference, {1.0, 1.0F, kUser}});
-    for (double seconds = 0.05; seconds < 1.0; seconds += 0.05) {
+    for (double seconds = 0.05; seconds < 1.0; seconds += 0.05)
         EXPECT_NEAR(at(curve, seconds), at(expected, seconds), 1.0e-6);
-    }
 }
 
 TEST(CurveEvaluation, FollowsTheInterpolationOfTheLeftKey) {
@@ -337,18 +335,15 @@ TEST(CurveEvaluation, GivesTheSameInAnyOrderOfSampling) {
     std::uniform_real_distribution<float> value(-10.0F, 10.0F);
     const Extrapolation repeat = {ExtrapolationType::repetition, -1};
     std::vector<Key> keys;
-    for (int i = 0; i < 200; ++i) {
+    for (int i = 0; i < 200; ++i)
         keys.push_back({i * 0.25, value(random), i % 3 == 0 ? kLinear : kAuto});
-    }
     const CurveKeys curve = curveOf(keys, repeat, repeat);
 
     detail::CurveCursor cursor;
-    for (int i = -2000; i < 6000; ++i) {
+    for (int i = -2000; i < 6000; ++i)
         ASSERT_EQ(detail::evaluate(curve, ticks(i / 60.0), &cursor), at(curve, i / 60.0)) << i;
-    }
-    for (int i = 6000; i > -2000; i -= 7) {
+    for (int i = 6000; i > -2000; i -= 7)
         ASSERT_EQ(detail::evaluate(curve, ticks(i / 60.0), &cursor), at(curve, i / 60.0)) << i;
-    }
     for (std::size_t wrong : {std::size_t{199}, std::size_t{200}, std::size_t{201}, SIZE_MAX, SIZE_MAX - 1}) {
         cursor.segment = wrong;
         EXPECT_EQ(detail::evaluate(curve, ticks(3.1), &cursor), at(curve, 3.1));
@@ -357,9 +352,8 @@ TEST(CurveEvaluation, GivesTheSameInAnyOrderOfSampling) {
 
 std::vector<FbxTime> timesOf(int first, int last, double rate) {
     std::vector<FbxTime> times;
-    for (int frame = first; frame < last; ++frame) {
+    for (int frame = first; frame < last; ++frame)
         times.emplace_back(ticks(frame / rate));
-    }
     return times;
 }
 
@@ -464,9 +458,8 @@ TEST(CurveEvaluation, SurvivesNumbersThatAreNone) {
 
             const CurveKeys broken = curveOf({{0.0, odd, flags}, {1.0, 2.0F, flags}, {2.0, odd, flags}});
             EXPECT_EQ(at(broken, 1.0), 2.0F);
-            if (std::isfinite(odd)) {
+            if (std::isfinite(odd))
                 EXPECT_TRUE(std::isfinite(at(broken, 1.5))) << flags << ' ' << odd;
-            }
         }
     }
 }
@@ -481,9 +474,8 @@ TEST(CurveEvaluation, SurvivesUnsortedTimes) {
                                    {3.0, 4.0F, kTcb},
                                    {4.0, 5.0F}},
                                   extrapolation, extrapolation);
-        for (auto& time : curve.times) {
+        for (auto& time : curve.times)
             time = static_cast<std::int64_t>(random());
-        }
         detail::CurveCursor cursor;
         cursor.segment = random() % 7;
         for (int i = 0; i < 50; ++i) {

@@ -158,9 +158,8 @@ TEST(CurveTangents, PutTheHandlesOfAMotionBuilderFileWhereItsUserDraggedThem) {
     EXPECT_NEAR(handle(2, 0.65), -2.5, kHandleTolerance);
     EXPECT_NEAR(handle(4, 0.5), 1.0, kHandleTolerance);
     EXPECT_NEAR(handle(5, 0.266627), -1.0, kHandleTolerance);
-    for (const std::size_t smooth : {2U, 4U, 5U}) {
+    for (const std::size_t smooth : {2U, 4U, 5U})
         EXPECT_NEAR(detail::leftSlope(curve, smooth), detail::rightSlope(curve, smooth), 1.0e-3) << smooth;
-    }
 }
 
 TEST(CurveTangents, HaveNoBiasWhenIndependentOfTime) {

@@ -177,7 +177,8 @@ TEST(AsciiSink, WritesBytesAsBase64) {
 }
 
 TEST(AsciiSink, WritesHeadingsAsComments) {
-    EXPECT_EQ(asciiBody(7400, [](RecordSink& sink) { sink.heading("Object properties"); }),
+    EXPECT_EQ(asciiBody(
+                  7400, [](RecordSink& sink) { sink.heading("Object properties"); }),
               "\n; Object properties\n;------------------------------------------------------------------\n\n");
 }
 

@@ -113,19 +113,16 @@ TEST_P(BinaryLayout, TurnsALongListOfOneScalarTypeIntoAnArray) {
     }
     file.end();
     file.begin("I");
-    for (int i = 0; i < 17; ++i) {
+    for (int i = 0; i < 17; ++i)
         file.int32(-i);
-    }
     file.end();
     file.begin("L");
-    for (int i = 0; i < 17; ++i) {
+    for (int i = 0; i < 17; ++i)
         file.int64(i);
-    }
     file.end();
     file.begin("F");
-    for (int i = 0; i < 17; ++i) {
+    for (int i = 0; i < 17; ++i)
         file.float32(0.5F);
-    }
     file.end();
 
     EXPECT_EQ(readText(file.finish()), "D: [" + expected +
@@ -136,9 +133,8 @@ TEST_P(BinaryLayout, TurnsALongListOfOneScalarTypeIntoAnArray) {
 
 TEST_P(BinaryLayout, KeepsTheValuesOfATupleApart) {
     file.begin("Matrix");
-    for (int i = 0; i < 16; ++i) {
+    for (int i = 0; i < 16; ++i)
         file.float64(i + 0.5);
-    }
     file.end();
     const ExactBytes bytes(file.finish());
     FbxStatus status;
@@ -154,9 +150,8 @@ TEST_P(BinaryLayout, KeepsTheValuesOfATupleApart) {
 
 TEST_P(BinaryLayout, ReadsNumbersFromAListOfMixedTypes) {
     file.begin("Mixed");
-    for (int i = 0; i < 20; ++i) {
+    for (int i = 0; i < 20; ++i)
         i % 2 == 0 ? file.float64(i + 0.5) : file.int32(i);
-    }
     file.end();
     const ExactBytes bytes(file.finish());
     FbxStatus status;
@@ -173,9 +168,8 @@ TEST_P(BinaryLayout, ReadsNumbersFromAListOfMixedTypes) {
 
 TEST_P(BinaryLayout, KeepsTheLettersOfAKeyList) {
     file.begin("Key");
-    for (int i = 0; i < 6; ++i) {
+    for (int i = 0; i < 6; ++i)
         file.int64(i).float64(0.5).letter('L');
-    }
     file.end();
 
     EXPECT_EQ(readText(file.finish()),
@@ -252,9 +246,8 @@ TEST(BinaryReader, KeepsNamesAndTextsAsTheyAre) {
 TEST(BinaryReader, ReadsALongNameAndManyRecords) {
     BinaryRecordBuilder file(7500);
     const std::string name(255, 'n');
-    for (int i = 0; i < 1000; ++i) {
+    for (int i = 0; i < 1000; ++i)
         file.begin(name).int32(i).end();
-    }
     const ExactBytes bytes(file.finish());
     FbxStatus status;
 
@@ -282,9 +275,8 @@ TEST(BinaryReader, RefusesUnknownVersions) {
 }
 
 TEST(BinaryReader, AcceptsUnknownVersionsBetweenKnownOnes) {
-    for (const std::uint32_t version : {3000U, 4050U, 7499U, 7501U, 7999U}) {
+    for (const std::uint32_t version : {3000U, 4050U, 7499U, 7501U, 7999U})
         EXPECT_EQ(readText(BinaryRecordBuilder(version).begin("Objects").int32(1).end().finish()), "Objects: 1");
-    }
 }
 
 } // namespace

@@ -102,9 +102,8 @@ TEST(BinarySink, CompressesArraysFrom1024BytesOn) {
 TEST(BinarySink, LeavesArraysRawThatDoNotShrink) {
     std::mt19937_64 random(1);
     std::vector<std::int64_t> noise(200);
-    for (std::int64_t& number : noise) {
+    for (std::int64_t& number : noise)
         number = static_cast<std::int64_t>(random());
-    }
 
     const std::string bytes = binaryBytes(7400, [&](RecordSink& sink) {
         sink.beginRecord("A");
@@ -129,9 +128,8 @@ TEST(BinarySink, RefusesAFileTooLargeForNarrowHeads) {
     MemoryOutput output;
     BinarySink sink(output, 7400, /*maxNarrowSize*/ 100);
 
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         emitCount(sink);
-    }
 
     EXPECT_TRUE(sink.failed());
     EXPECT_NE(sink.fault().find("7400"), std::string::npos) << sink.fault();
@@ -152,9 +150,8 @@ TEST(BinarySink, KeepsAnySizeWithWideHeads) {
     MemoryOutput output;
     BinarySink sink(output, 7500, /*maxNarrowSize*/ 100);
 
-    for (int i = 0; i < 100; ++i) {
+    for (int i = 0; i < 100; ++i)
         emitCount(sink);
-    }
 
     EXPECT_FALSE(sink.failed());
 }

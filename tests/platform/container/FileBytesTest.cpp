@@ -23,9 +23,8 @@ namespace {
 class FileBytesTest : public testing::Test {
 protected:
     FileBytesTest() : mContent(kSize, '\0') {
-        for (std::size_t i = 0; i < kSize; ++i) {
+        for (std::size_t i = 0; i < kSize; ++i)
             mContent[i] = static_cast<char>(i % 251);
-        }
     }
     std::shared_ptr<const FileBytes> open() {
         const std::string name = mFolder.write("file", mContent);

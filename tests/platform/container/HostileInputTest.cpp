@@ -32,9 +32,8 @@ std::string binaryFile(std::uint32_t version, ByteOrder order) {
     file.begin("Vertices").array<double>('d', {1, 2, 3}).end();
     file.begin("Edges").compressedArray<std::int32_t>('i', {1, 2, 3, 4, 5, 6, 7, 8}).end();
     file.begin("Points");
-    for (int i = 0; i < 18; ++i) {
+    for (int i = 0; i < 18; ++i)
         file.float64(i);
-    }
     file.end();
     file.begin("Lost").int32(1).loseEnd().end();
     file.end();
@@ -67,9 +66,8 @@ std::vector<std::string> smallFiles() {
 }
 
 TEST(HostileInput, ReadsTheUndamagedFiles) {
-    for (const std::string& file : smallFiles()) {
+    for (const std::string& file : smallFiles())
         EXPECT_TRUE(readText(file).starts_with("FBXHeaderExtension: {")) << readText(file);
-    }
 }
 
 TEST(HostileInput, RefusesEveryPrefixOfABinaryFile) {
@@ -87,9 +85,8 @@ TEST(HostileInput, SurvivesEveryPrefixOfAnAsciiFile) {
     for (std::size_t size = 0; size < kAsciiFile.size(); ++size) {
         const std::string text = readText(std::string_view(kAsciiFile).substr(0, size));
         // Only between its top-level records can a file end.
-        if (size > objects + std::string_view("Objects:  ").size() && size <= lastBrace) {
+        if (size > objects + std::string_view("Objects:  ").size() && size <= lastBrace)
             ASSERT_TRUE(text.starts_with("test.fbx: ")) << size << " bytes: " << text;
-        }
     }
 }
 
@@ -98,9 +95,8 @@ TEST(HostileInput, SurvivesFlippedBytes) {
     for (const std::string& file : smallFiles()) {
         for (int i = 0; i < 20'000; ++i) {
             std::string damaged = file;
-            for (std::uint_fast32_t flips = 1 + random() % 3; flips > 0; --flips) {
+            for (std::uint_fast32_t flips = 1 + random() % 3; flips > 0; --flips)
                 damaged[random() % damaged.size()] = static_cast<char>(random());
-            }
             ASSERT_EQ(readText(damaged), readText(damaged));
         }
     }
@@ -230,13 +226,11 @@ TEST(HostileInput, RefusesArraysThatTogetherExpandBeyondReason) {
     BinaryRecordBuilder file(7400);
     const std::string stream = BinaryRecordBuilder::deflated(file.encode(zeros));
     ASSERT_LT(stream.size(), 2000U);
-    for (int i = 0; i < 28; ++i) {
+    for (int i = 0; i < 28; ++i)
         file.begin("List").arrayOf('d', zeros.size(), 1, stream).end();
-    }
     EXPECT_TRUE(readText(BinaryRecordBuilder(file).finish()).starts_with("List: ["));
-    for (int i = 0; i < 42; ++i) {
+    for (int i = 0; i < 42; ++i)
         file.begin("List").arrayOf('d', zeros.size(), 1, stream).end();
-    }
 
     EXPECT_NE(readText(file.finish()).find(": the arrays expand to more than 512 times the size of the file"),
               std::string::npos);
@@ -244,20 +238,17 @@ TEST(HostileInput, RefusesArraysThatTogetherExpandBeyondReason) {
 
 std::string nestedBinary(int levels) {
     BinaryRecordBuilder file(7400);
-    for (int i = 0; i < levels; ++i) {
+    for (int i = 0; i < levels; ++i)
         file.begin("N").block();
-    }
-    for (int i = 0; i < levels; ++i) {
+    for (int i = 0; i < levels; ++i)
         file.end();
-    }
     return file.finish();
 }
 
 std::string nestedAscii(int levels) {
     std::string text = "; FBX 7.5.0\n";
-    for (int i = 0; i < levels; ++i) {
+    for (int i = 0; i < levels; ++i)
         text += "N: {";
-    }
     return text + std::string(static_cast<std::size_t>(levels), '}');
 }
 
@@ -304,9 +295,8 @@ public:
 
 private:
     void* do_allocate(std::size_t size, std::size_t alignment) override {
-        if (size > mLeft) {
+        if (size > mLeft)
             throw std::bad_alloc();
-        }
         mLeft -= size;
         return std::pmr::new_delete_resource()->allocate(size, alignment);
     }
@@ -335,27 +325,23 @@ std::vector<std::string> dustFiles() {
     constexpr int kCount = 300'000;
     std::vector<std::string> files;
     BinaryRecordBuilder records(7400);
-    for (int i = 0; i < kCount; ++i) {
+    for (int i = 0; i < kCount; ++i)
         records.bytes(std::string_view("\0\0\0\0\0\0\0\0\0\0\0\0\1x", 14));
-    }
     files.push_back(records.finish());
     BinaryRecordBuilder letters(7400);
     letters.begin("A");
-    for (int i = 0; i < kCount; ++i) {
+    for (int i = 0; i < kCount; ++i)
         letters.letter('x');
-    }
     files.push_back(letters.end().finish());
     BinaryRecordBuilder arrays(7400);
     arrays.begin("A");
-    for (int i = 0; i < kCount; ++i) {
+    for (int i = 0; i < kCount; ++i)
         arrays.array<double>('d', {});
-    }
     files.push_back(arrays.end().finish());
     for (const std::string_view piece : {"a:", "1,", "T,", "\"\",", "*0{},", "\"&lf;\",", "a:*0{}"}) {
         std::string ascii = piece == "a:" || piece == "a:*0{}" ? "; FBX 7.5.0\n" : "; FBX 7.5.0\nA: T,";
-        for (int i = 0; i < kCount; ++i) {
+        for (int i = 0; i < kCount; ++i)
             ascii += piece;
-        }
         files.push_back(ascii);
     }
     return files;
@@ -380,9 +366,8 @@ TEST(HostileInput, SaysSoWhenMemoryRunsOut) {
         const DefaultResource use(memory);
         FbxStatus status;
 
-        if (readRecords(std::span(file.data(), file.size()), "test.fbx", status)) {
+        if (readRecords(std::span(file.data(), file.size()), "test.fbx", status))
             continue; // one that needs little, like a single list of numbers
-        }
         EXPECT_EQ(status.GetCode(), FbxStatus::eInsufficientMemory);
         EXPECT_STREQ(status.GetErrorString(), "test.fbx: not enough memory");
         ++refused;

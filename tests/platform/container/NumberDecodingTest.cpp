@@ -49,9 +49,8 @@ protected:
             file.compressedArray(code, numbers);
             break;
         case Form::scalars:
-            for (const Number number : numbers) {
+            for (const Number number : numbers)
                 file.value(static_cast<char>(code - 'a' + 'A')).number(number);
-            }
             break;
         }
         mBytes = std::make_unique<ExactBytes>(file.end().finish());
@@ -84,9 +83,8 @@ INSTANTIATE_TEST_SUITE_P(EveryForm, StoredNumbers,
 /// Seventeen numbers and more, so that scalars become a list.
 template <class Number>
 std::vector<Number> padded(std::vector<Number> numbers) {
-    for (int i = 0; i < 20; ++i) {
+    for (int i = 0; i < 20; ++i)
         numbers.push_back(static_cast<Number>(i));
-    }
     return numbers;
 }
 
@@ -198,9 +196,8 @@ TEST_P(StoredNumbers, FillsWithZerosWhenMoreAreRequestedThanThereAre) {
 
 TEST(NumberDecoding, InflatesLargeArraysInPlace) {
     std::vector<std::int32_t> numbers(100'000);
-    for (std::size_t i = 0; i < numbers.size(); ++i) {
+    for (std::size_t i = 0; i < numbers.size(); ++i)
         numbers[i] = static_cast<std::int32_t>(i * 2654435761U % 1000003);
-    }
     BinaryRecordBuilder file(7500);
     const ExactBytes bytes(file.begin("List").compressedArray('i', numbers).end().finish());
     FbxStatus status;

@@ -28,10 +28,8 @@ TEST(NumberText, FindsTheEndOfAPlainNumber) {
         const std::string_view text(number);
         EXPECT_EQ(plainLength(text), text.size()) << text;
         for (const char* const behind : {",1", " ", "\n", "}", ";", "x", ".#"}) {
-            if (text.find('.') == std::string_view::npos && text.find('e') == std::string_view::npos &&
-                *behind == '.') {
+            if (text.find('.') == std::string_view::npos && text.find('e') == std::string_view::npos && *behind == '.')
                 continue; // a point would belong to the number
-            }
             EXPECT_EQ(plainLength(std::string(text) + behind), text.size()) << text << behind;
         }
     }
@@ -39,9 +37,8 @@ TEST(NumberText, FindsTheEndOfAPlainNumber) {
 
 TEST(NumberText, FindsNoPlainNumberWhereNoneIs) {
     for (const char* const text :
-         {"", "-", "+", ".", "-.", "e5", "-e5", ".e5", "1e", "1e+", "1.5e-", "x", "inf", "nan", " 1"}) {
+         {"", "-", "+", ".", "-.", "e5", "-e5", ".e5", "1e", "1e+", "1.5e-", "x", "inf", "nan", " 1"})
         EXPECT_EQ(plainLength(text), 0U) << text;
-    }
 }
 
 TEST(NumberText, CountsDigitsAtEveryAlignmentAndLength) {
@@ -114,9 +111,8 @@ TEST(NumberText, ReadsWholeNumbersOnlyWhereNothingIsLost) {
     EXPECT_EQ(parseInteger("9223372036854775807"), std::numeric_limits<std::int64_t>::max());
     EXPECT_EQ(parseInteger("-9223372036854775808"), std::numeric_limits<std::int64_t>::min());
     for (const char* const text :
-         {"", "+", "-", "+-1", "-+1", "++1", "1.0", "1e2", "-0", "-00", "9223372036854775808", "x", "1x"}) {
+         {"", "+", "-", "+-1", "-+1", "++1", "1.0", "1e2", "-0", "-00", "9223372036854775808", "x", "1x"})
         EXPECT_FALSE(parseInteger(text)) << text;
-    }
 }
 
 TEST(NumberText, DoesNotDependOnTheLocale) {

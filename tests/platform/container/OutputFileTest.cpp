@@ -35,9 +35,8 @@ std::span<const char> span(const std::string& text) { return {text.data(), text.
 
 bool writeFile(const std::string& name, const std::string& content, FbxStatus& status) {
     OutputFile file(name);
-    if (!file.open(status)) {
+    if (!file.open(status))
         return false;
-    }
     file.write(span(content));
     return file.commit(status);
 }
@@ -107,11 +106,9 @@ TEST(OutputFile, ChangesBytesThatAreOnTheMediumInTheBufferAndAcross) {
         const std::string piece(10007, static_cast<char>('a' + i % 26));
         file.write(span(piece));
         expected += piece;
-        if (expected.size() > (1 << 18) && expected.size() < (1 << 18) + 20000) {
-            for (std::size_t offset = (1 << 18) - 20000; offset < expected.size() - 100; offset += 97) {
+        if (expected.size() > (1 << 18) && expected.size() < (1 << 18) + 20000)
+            for (std::size_t offset = (1 << 18) - 20000; offset < expected.size() - 100; offset += 97)
                 change(offset, "0123456789");
-            }
-        }
     }
     change(0, "first");
     change(expected.size() - 4, "last");
@@ -370,12 +367,10 @@ TEST(OutputFile, IsOnTheMediumButNotUnderItsNameWhenItIsComplete) {
 
 bool writeLargeFile(const std::string& name, FileOperations& operations, FbxStatus& status) {
     OutputFile file(name, operations);
-    if (!file.open(status)) {
+    if (!file.open(status))
         return false;
-    }
-    for (int i = 0; i < 10; ++i) {
+    for (int i = 0; i < 10; ++i)
         file.write(span(std::string(100000, 'x')));
-    }
     file.overwrite(5, span("head"));
     file.write(span(std::string(1 << 20, 'y')));
     return file.commit(status);
@@ -482,9 +477,8 @@ TEST(OutputFile, DoesNotGatherInMemoryWhatAPipeGets) {
 bool writePair(const TemporaryFolder& folder, FbxStatus& status, FileOperations& operations,
                const char* secondName = "second") {
     OutputFile first(folder.file("first"), operations), second(folder.file(secondName), operations);
-    if (!first.open(status) || !second.open(status)) {
+    if (!first.open(status) || !second.open(status))
         return false;
-    }
     first.write(span("new first"));
     second.write(span("new second"));
     OutputFile* const both[] = {&first, &second};
@@ -511,9 +505,8 @@ TEST(OutputFilesTogether, SurviveAFaultInEverySingleOperation) {
         const auto restore = [&] {
             for (const char* name : {"first", "second"}) {
                 fs::remove(folder.file(name));
-                if (replacing) {
+                if (replacing)
                     folder.write(name, std::string("old ") + name);
-                }
             }
         };
         restore();
@@ -548,9 +541,8 @@ TEST(OutputFilesTogether, OfOneNameAreTheLastOneOrWhatStoodThereBefore) {
     for (const bool replacing : {false, true}) {
         for (int failAt = 0; failAt < none.calls(); ++failAt) {
             fs::remove(folder.file("first"));
-            if (replacing) {
+            if (replacing)
                 folder.write("first", "old");
-            }
             const std::vector<std::string> before = folder.files();
             FailingOperations operations(failAt);
 

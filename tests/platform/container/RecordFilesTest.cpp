@@ -17,11 +17,9 @@ namespace {
 
 std::vector<std::string> recordFiles() {
     std::vector<std::string> files;
-    for (const auto& entry : std::filesystem::directory_iterator(TARNELL_TEST_DATA "/container")) {
-        if (entry.path().extension() == ".fbx") {
+    for (const auto& entry : std::filesystem::directory_iterator(TARNELL_TEST_DATA "/container"))
+        if (entry.path().extension() == ".fbx")
             files.push_back(entry.path().stem());
-        }
-    }
     return files;
 }
 

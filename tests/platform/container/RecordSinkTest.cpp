@@ -112,17 +112,15 @@ TEST_P(SinkLayout, KeepsTheBitsOfReals) {
     std::vector<double> numbers{0.0, -0.0, 1.0 / 3, 5e-324, std::numeric_limits<double>::max(), 25.114999771118164};
     while (numbers.size() < 1000) {
         const auto number = std::bit_cast<double>(random());
-        if (std::isfinite(number)) {
+        if (std::isfinite(number))
             numbers.push_back(number);
-        }
     }
 
     const std::vector<double> back = arrayBack(numbers);
 
     ASSERT_EQ(back.size(), numbers.size());
-    for (std::size_t i = 0; i < numbers.size(); ++i) {
+    for (std::size_t i = 0; i < numbers.size(); ++i)
         EXPECT_EQ(std::bit_cast<std::uint64_t>(back[i]), std::bit_cast<std::uint64_t>(numbers[i])) << i;
-    }
 }
 
 TEST_P(SinkLayout, KeepsTheBitsOfFloats) {
@@ -130,17 +128,15 @@ TEST_P(SinkLayout, KeepsTheBitsOfFloats) {
     std::vector<float> numbers{0.0F, -0.0F, 1.0F / 3, 1e-45F, std::numeric_limits<float>::max()};
     while (numbers.size() < 1000) {
         const auto number = std::bit_cast<float>(static_cast<std::uint32_t>(random()));
-        if (std::isfinite(number)) {
+        if (std::isfinite(number))
             numbers.push_back(number);
-        }
     }
 
     const std::vector<float> back = arrayBack(numbers);
 
     ASSERT_EQ(back.size(), numbers.size());
-    for (std::size_t i = 0; i < numbers.size(); ++i) {
+    for (std::size_t i = 0; i < numbers.size(); ++i)
         EXPECT_EQ(std::bit_cast<std::uint32_t>(back[i]), std::bit_cast<std::uint32_t>(numbers[i])) << i;
-    }
 }
 
 TEST_P(SinkLayout, KeepsArraysOfWholeNumbers) {
@@ -208,9 +204,8 @@ TEST_P(SinkLayout, KeepsTextsWithQuotesColonsLineBreaksAndNothing) {
     });
 
     ASSERT_EQ(record.values.size(), std::size(texts));
-    for (std::size_t i = 0; i < std::size(texts); ++i) {
+    for (std::size_t i = 0; i < std::size(texts); ++i)
         EXPECT_EQ(record.value(i).toText(), texts[i]);
-    }
 }
 
 TEST_P(SinkLayout, KeepsLetters) {
@@ -274,9 +269,8 @@ TEST_P(SinkLayout, GivesTheSameBytesAgain) {
 
 TEST_P(SinkLayout, WritesListsOfAHundredThousandElements) {
     std::vector<double> numbers(100000);
-    for (std::size_t i = 0; i < numbers.size(); ++i) {
+    for (std::size_t i = 0; i < numbers.size(); ++i)
         numbers[i] = static_cast<double>(i) / 7;
-    }
 
     EXPECT_EQ(arrayBack(numbers), numbers);
 }
@@ -322,10 +316,12 @@ void emitWhole(RecordSink& sink, const std::function<void()>& content) {
 
 TEST_P(SinkParts, WritesPartsAsIfOneAfterTheOther) {
     const std::string inTurn = bytesOf([](RecordSink& sink) {
-        emitWhole(sink, [&] {
-            for (const RecordSink::Part& part : manyParts())
-                part(sink);
-        });
+        emitWhole(
+            sink,
+            [&] {
+                for (const RecordSink::Part& part : manyParts())
+                    part(sink);
+            });
     });
     const std::string atOnce = bytesOf([](RecordSink& sink) { emitWhole(sink, [&] { sink.parts(manyParts()); }); });
 

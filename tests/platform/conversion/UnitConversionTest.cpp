@@ -316,10 +316,9 @@ TEST_F(UnitConversionTest, ScalesTheLimitsOfWhatItConverts) {
     FbxNode* child = addNode("child", top);
     FbxNode* independent = addNode("independent", top);
     independent->SetTransformationInheritType(FbxTransform::eInheritRrs);
-    for (FbxNode* node : {top, child, independent}) {
+    for (FbxNode* node : {top, child, independent})
         for (const char* limit : {"TranslationMin", "TranslationMax", "ScalingMin", "ScalingMax", "RotationMax"})
             node->FindProperty(limit).Set(FbxDouble3(1, 2, 3));
-    }
     scene->GetGlobalSettings().SetSystemUnit(FbxSystemUnit::m);
 
     FbxSystemUnit::cm.ConvertScene(scene);

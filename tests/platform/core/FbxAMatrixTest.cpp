@@ -19,17 +19,14 @@ constexpr double kTolerance = 1.0e-12;
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 
 void expectNear(const FbxDouble4& actual, const FbxDouble4& expected, double tolerance = kTolerance) {
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         EXPECT_NEAR(actual[i], expected[i], tolerance) << i;
-    }
 }
 
 void expectNear(const FbxAMatrix& actual, const FbxAMatrix& expected, double tolerance = kTolerance) {
-    for (int i = 0; i < 4; ++i) {
-        for (int j = 0; j < 4; ++j) {
+    for (int i = 0; i < 4; ++i)
+        for (int j = 0; j < 4; ++j)
             EXPECT_NEAR(actual[i][j], expected[i][j], tolerance) << i << ' ' << j;
-        }
-    }
 }
 
 const FbxVector4 kTranslation(1.0, -2.0, 3.0);
@@ -41,9 +38,8 @@ TEST(FbxAMatrix, IsSixteenContiguousDoubles) {
     FbxAMatrix matrix;
     double* raw = matrix;
 
-    for (int i = 0; i < 16; ++i) {
+    for (int i = 0; i < 16; ++i)
         raw[i] = i;
-    }
 
     for (int i = 0; i < 4; ++i) {
         for (int j = 0; j < 4; ++j) {
@@ -57,15 +53,12 @@ TEST(FbxAMatrix, IsSixteenContiguousDoubles) {
 
 TEST(FbxAMatrix, IsTheIdentityAtFirst) {
     const FbxAMatrix matrix;
-    for (int i = 0; i < 4; ++i) {
-        for (int j = 0; j < 4; ++j) {
+    for (int i = 0; i < 4; ++i)
+        for (int j = 0; j < 4; ++j)
             EXPECT_EQ(matrix[i][j], i == j ? 1.0 : 0.0);
-        }
-    }
     EXPECT_TRUE(matrix.IsIdentity());
-    for (int j = 0; j < 3; ++j) {
+    for (int j = 0; j < 3; ++j)
         EXPECT_FALSE(std::signbit(matrix.GetR()[j]));
-    }
 }
 
 TEST(FbxAMatrix, StoresScaledAxesInRowsAndTheTranslationInTheLast) {
@@ -117,9 +110,8 @@ TEST(FbxAMatrix, MultipliesAllSixteenElements) {
     for (int i = 0; i < 4; ++i) {
         for (int j = 0; j < 4; ++j) {
             double expected = 0.0;
-            for (int k = 0; k < 4; ++k) {
+            for (int k = 0; k < 4; ++k)
                 expected += a[k][j] * b[i][k];
-            }
             EXPECT_EQ(product[i][j], expected) << i << ' ' << j;
         }
     }
@@ -243,9 +235,8 @@ TEST(FbxAMatrix, CanBeScaledAgainAfterAScaleOfZero) {
 TEST(FbxAMatrix, SurvivesParallelAxesBesideAZeroOne) {
     FbxAMatrix matrix;
     double* raw = matrix;
-    for (int i = 0; i < 16; ++i) {
+    for (int i = 0; i < 16; ++i)
         raw[i] = 0.0;
-    }
     matrix[0][0] = 1.0;
     matrix[1][0] = 2.0;
     for (int j = 0; j < 3; ++j) {
@@ -339,11 +330,9 @@ TEST(FbxAMatrix, EqualsWithinAMillionth) {
 
 TEST(FbxAMatrix, TransposesAllSixteenElements) {
     const FbxAMatrix matrix(kTranslation, kRotation, kScale);
-    for (int i = 0; i < 4; ++i) {
-        for (int j = 0; j < 4; ++j) {
+    for (int i = 0; i < 4; ++i)
+        for (int j = 0; j < 4; ++j)
             EXPECT_EQ(matrix.Transpose()[i][j], matrix[j][i]);
-        }
-    }
 }
 
 TEST(FbxAMatrix, KeepsItsOtherPartsWhenAQuaternionIsSet) {
@@ -374,9 +363,8 @@ TEST(FbxAMatrix, TakesTheElementwiseWorkOfHosts) {
     FbxAMatrix sum;
     const FbxAMatrix weighted = FbxAMatrix(kTranslation, kRotation, kScale) * 0.25;
     double* raw = sum;
-    for (int i = 0; i < 16; ++i) {
+    for (int i = 0; i < 16; ++i)
         raw[i] = raw[i] * 0.75 + static_cast<const double*>(weighted)[i];
-    }
     EXPECT_NEAR(sum[3][3], 1.0, kTolerance);
     expectNear(sum.MultT(FbxVector4(0.0, 0.0, 0.0)), FbxDouble4(0.25, -0.5, 0.75, 1.0));
 }

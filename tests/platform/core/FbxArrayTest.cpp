@@ -45,9 +45,8 @@ TEST(FbxArray, ReturnsItsElements) {
     array.SetAt(1, 5);
     array.GetArray()[2] = 7;
     int sum = 0;
-    for (const int item : array) {
+    for (const int item : array)
         sum += item;
-    }
     EXPECT_EQ(sum, 12);
     EXPECT_EQ(array.GetAt(0), 0);
     array.Resize(-1);

@@ -15,9 +15,8 @@ using namespace fbxsdk;
 TEST(FbxMatrix, TakesOverAnAffineMatrix) {
     const FbxAMatrix affine(FbxVector4(1.0, 2.0, 3.0), FbxVector4(10.0, 20.0, 30.0), FbxVector4(2.0, 2.0, 2.0));
     const FbxMatrix matrix(affine);
-    for (int i = 0; i < 16; ++i) {
+    for (int i = 0; i < 16; ++i)
         EXPECT_EQ(static_cast<const double*>(matrix)[i], static_cast<const double*>(affine)[i]);
-    }
 }
 
 TEST(FbxMatrix, IsUndoneByItsInverse) {
@@ -25,9 +24,8 @@ TEST(FbxMatrix, IsUndoneByItsInverse) {
     std::uniform_real_distribution<double> element(-1.0, 1.0);
     for (int n = 0; n < 1000; ++n) {
         FbxMatrix matrix;
-        for (int i = 0; i < 4; ++i) {
+        for (int i = 0; i < 4; ++i)
             matrix.SetRow(i, FbxVector4(element(random), element(random), element(random), element(random)));
-        }
         EXPECT_EQ(matrix * matrix.Inverse(), FbxMatrix());
     }
 }

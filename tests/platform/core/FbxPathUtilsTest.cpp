@@ -81,9 +81,8 @@ TEST(FbxPathUtils, GivesTheFolderOfAFile) {
         {"C:/shot.fbx", "C:/"},        {"a/b/", "a/b"},      {"a//b.fbx", "a"},  {"", ""},
         {"//server/x", "//server"},    {"/", "/"},           {"../x.fbx", ".."},
     };
-    for (const auto& [path, expected] : rows) {
+    for (const auto& [path, expected] : rows)
         EXPECT_STREQ(FbxPathUtils::GetFolderName(path), expected) << path;
-    }
 }
 
 TEST(FbxPathUtils, GivesTheNameOfAFile) {
@@ -116,12 +115,10 @@ TEST(FbxPathUtils, BindsRootAndFile) {
 }
 
 TEST(FbxPathUtils, TellsRelativePaths) {
-    for (const char* const path : {"a", "a/b", "../a", "", "a:b", "./a"}) {
+    for (const char* const path : {"a", "a/b", "../a", "", "a:b", "./a"})
         EXPECT_TRUE(FbxPathUtils::IsRelative(path)) << path;
-    }
-    for (const char* const path : {"/a", "\\a", "C:/a", "C:\\a", "//server/a", "\\\\server\\a"}) {
+    for (const char* const path : {"/a", "\\a", "C:/a", "C:\\a", "//server/a", "\\\\server\\a"})
         EXPECT_FALSE(FbxPathUtils::IsRelative(path)) << path;
-    }
 }
 
 TEST(FbxPathUtils, GivesAFileAsSeenFromARootFolder) {
@@ -144,9 +141,8 @@ TEST(FbxPathUtils, GivesAFileAsSeenFromARootFolder) {
         {"/a/./b/../", "/a/c/../x.xml", "x.xml"},
         {"out", "out/x.xml", "x.xml"},
     };
-    for (const auto& [root, file, expected] : rows) {
+    for (const auto& [root, file, expected] : rows)
         EXPECT_STREQ(FbxPathUtils::GetRelativeFilePath(root, file), expected) << root << ' ' << file;
-    }
     EXPECT_STREQ(FbxPathUtils::GetRelativePath("/a/b", "/a/b"), ".");
     EXPECT_STREQ(FbxPathUtils::GetRelativePath("/a/b", "/a/c"), "../c");
 }

@@ -14,9 +14,8 @@ using namespace fbxsdk;
 constexpr double kTolerance = 1.0e-12;
 
 void expectNear(const FbxDouble4& actual, const FbxDouble4& expected) {
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         EXPECT_NEAR(actual[i], expected[i], kTolerance) << i;
-    }
 }
 
 TEST(FbxQuaternion, IsTheIdentityAtFirst) { expectNear(FbxQuaternion(), FbxDouble4(0.0, 0.0, 0.0, 1.0)); }

@@ -85,9 +85,8 @@ TEST(FbxTime, HasTheDocumentedNumberAndRateForEveryMode) {
 
 TEST(FbxTime, NamesEveryModeDifferently) {
     std::set<std::string> names;
-    for (const auto& row : detail::timeModes()) {
+    for (const auto& row : detail::timeModes())
         names.insert(row.name);
-    }
     EXPECT_EQ(names.size(), static_cast<size_t>(FbxTime::eModesCount));
     EXPECT_EQ(names.count(""), 0U);
 }
@@ -114,11 +113,9 @@ TEST(FbxTime, PutsTheSecondsOfAFrameExactlyOnThatFrameInEveryMode) {
 }
 
 TEST(FbxTime, PutsTheSecondsOfAFrameExactlyOnItsTicksInExactModes) {
-    for (const RateRow& row : kRates) {
-        for (FbxLongLong k = 1; row.ticksPerFrame != 0 && k < 200000; k += 2) {
+    for (const RateRow& row : kRates)
+        for (FbxLongLong k = 1; row.ticksPerFrame != 0 && k < 200000; k += 2)
             ASSERT_EQ(atSeconds(static_cast<double>(k) / row.rate).Get(), k * row.ticksPerFrame) << row.number;
-        }
-    }
 }
 
 TEST(FbxTime, ComesBackToTheFrameThatWasSet) {
@@ -146,11 +143,9 @@ TEST(FbxTime, CountsAShotOf1001FramesAtTheNtscRatesWhicheverSpellingWroteIt) {
         {FbxTime::eNTSCFullFrame, static_cast<double>(29.9700262F)},
         {FbxTime::eNTSCFullFrame, 30000.0 / 1001.0},
     };
-    for (const Shot& shot : shots) {
-        for (int frame = -1001; frame <= 1001; ++frame) {
+    for (const Shot& shot : shots)
+        for (int frame = -1001; frame <= 1001; ++frame)
             ASSERT_EQ(atSeconds(frame / shot.writtenRate).GetFrameCount(shot.mode), frame) << shot.writtenRate;
-        }
-    }
 }
 
 TEST(FbxTime, TruncatesFramesTowardZeroOutsideAHundredthOfAFrame) {
@@ -286,9 +281,8 @@ TEST(FbxTime, CountsInTheCustomRate) {
 
     EXPECT_EQ(FbxTime::GetFrameRate(FbxTime::eDefaultMode), 12.5);
     EXPECT_EQ(FbxTime::GetFrameRate(FbxTime::eCustom), 12.5);
-    for (int frame = -5000; frame <= 5000; ++frame) {
+    for (int frame = -5000; frame <= 5000; ++frame)
         ASSERT_EQ(atSeconds(frame / 12.5).GetFrameCount(), frame);
-    }
 }
 
 TEST(FbxTime, FallsBackTo30WithoutAUsableCustomRate) {

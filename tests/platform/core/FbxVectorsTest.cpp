@@ -116,9 +116,8 @@ TEST(FbxColor, IsOpaqueBlackAtFirst) {
 
 TEST(FbxColor, ReturnsComponentsByIndex) {
     FbxColor color;
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         color[i] = i;
-    }
     EXPECT_EQ(color, FbxColor(0.0, 1.0, 2.0, 3.0));
     EXPECT_EQ(color[99], 3.0);
     EXPECT_EQ(color[-1], 3.0);

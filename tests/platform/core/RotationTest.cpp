@@ -31,20 +31,17 @@ constexpr double kRoundTrip = 4.0e-15;
 
 double largestDifference(const Axes& a, const Axes& b) {
     double largest = 0.0;
-    for (size_t i = 0; i < 3; ++i) {
-        for (size_t j = 0; j < 3; ++j) {
+    for (size_t i = 0; i < 3; ++i)
+        for (size_t j = 0; j < 3; ++j)
             largest = std::max(largest, std::abs(a[i][j] - b[i][j]));
-        }
-    }
     return largest;
 }
 
 std::string print(const Axes& axes) {
     std::string text;
     for (const auto& row : axes) {
-        for (const double element : row) {
+        for (const double element : row)
             text += std::to_string(element) + ' ';
-        }
         text += '\n';
     }
     return text;
@@ -70,9 +67,8 @@ FbxVector4 randomAngles(std::mt19937_64& random) {
 }
 
 TEST(Rotation, HasTheDocumentedOrderNumbers) {
-    for (int i = 0; i < 7; ++i) {
+    for (int i = 0; i < 7; ++i)
         EXPECT_EQ(kOrders[i].order, i);
-    }
 }
 
 TEST(Rotation, AppliesTheAnglesInTheOrderOfItsLetters) {
@@ -118,9 +114,8 @@ TEST(Rotation, ComesBackToTheSameAnglesWhileTheMiddleOneIsBelow90Degrees) {
 
             const FbxVector4 again = detail::eulerFromAxes(detail::axesFromEuler(angles, order), order);
 
-            for (int j = 0; j < 3; ++j) {
+            for (int j = 0; j < 3; ++j)
                 ASSERT_NEAR(again[j], angles[j], 1.0e-11) << letters;
-            }
             ASSERT_EQ(again[3], 1.0);
         }
     }
@@ -132,15 +127,12 @@ TEST(Rotation, IsExactForAllMultiplesOf90Degrees) {
             for (int y = -720; y <= 720; y += 90) {
                 for (int z = -720; z <= 720; z += 90) {
                     const Axes axes = detail::axesFromEuler(FbxVector4(x, y, z), order);
-                    for (const auto& row : axes) {
-                        for (const double element : row) {
+                    for (const auto& row : axes)
+                        for (const double element : row)
                             ASSERT_TRUE(element == 0.0 || element == 1.0 || element == -1.0) << print(axes);
-                        }
-                    }
                     const FbxVector4 angles = detail::eulerFromAxes(axes, order);
-                    for (int j = 0; j < 3; ++j) {
+                    for (int j = 0; j < 3; ++j)
                         ASSERT_EQ(std::remainder(angles[j], 90.0), 0.0) << letters << ' ' << angles[j];
-                    }
                     ASSERT_EQ(detail::axesFromEuler(angles, order), axes) << letters << '\n' << print(axes);
                 }
             }
@@ -229,9 +221,8 @@ TEST(RotationQuaternion, GivesTheAnglesOfEveryOrder) {
     for (const auto& [order, letters] : kOrders) {
         const FbxVector4 angles(12.0, -34.0, 56.0);
         const FbxVector4 again = detail::eulerFromQuaternion(detail::quaternionFromEuler(angles, order), order);
-        for (int j = 0; j < 3; ++j) {
+        for (int j = 0; j < 3; ++j)
             EXPECT_NEAR(again[j], angles[j], 1.0e-12) << letters;
-        }
     }
 }
 

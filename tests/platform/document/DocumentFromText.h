@@ -56,10 +56,12 @@ inline std::int64_t idOf(const Document& document, std::string_view record, std:
 
 inline bool isConnected(const Document& document, std::int64_t source, std::int64_t destination,
                         std::string_view destinationProperty = {}) {
-    return std::any_of(document.connections.begin(), document.connections.end(), [&](const DocumentConnection& edge) {
-        return edge.source == source && edge.destination == destination &&
-               edge.destinationProperty == destinationProperty;
-    });
+    return std::any_of(
+        document.connections.begin(), document.connections.end(),
+        [&](const DocumentConnection& edge) {
+            return edge.source == source && edge.destination == destination &&
+                   edge.destinationProperty == destinationProperty;
+        });
 }
 
 /// The names of the sources of that record kind, in order of connection.
@@ -100,8 +102,9 @@ inline const DocumentProperty* settingNamed(const Document& document, std::strin
 
 /// True when some warning contains the words.
 inline bool warnsOf(const Document& document, std::string_view words) {
-    return std::any_of(document.warnings.begin(), document.warnings.end(),
-                       [&](const std::string& warning) { return warning.find(words) != std::string::npos; });
+    return std::any_of(
+        document.warnings.begin(), document.warnings.end(),
+        [&](const std::string& warning) { return warning.find(words) != std::string::npos; });
 }
 
 using Numbers = std::vector<double>;

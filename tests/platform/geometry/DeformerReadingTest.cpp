@@ -25,9 +25,8 @@ const std::string kTurned = "Transform: *16 { a: 0,1,0,0, -1,0,0,0, 0,0,1,0, 0,5
 
 std::vector<std::pair<int, double>> influencesOf(const FbxCluster& cluster) {
     std::vector<std::pair<int, double>> influences;
-    for (int i = 0; i < cluster.GetControlPointIndicesCount(); ++i) {
+    for (int i = 0; i < cluster.GetControlPointIndicesCount(); ++i)
         influences.emplace_back(cluster.GetControlPointIndices()[i], cluster.GetControlPointWeights()[i]);
-    }
     return influences;
 }
 
@@ -177,18 +176,16 @@ TEST_F(DeformerReading, PrefersThePropertyToTheRecord) {
 
 TEST_F(DeformerReading, ReadsFullWeights) {
     auto* channel = readDeformer<FbxBlendShapeChannel>("FullWeights: *3 { a: -49.9,-24.9,100 }");
-    for (int i = 0; i < 3; ++i) {
+    for (int i = 0; i < 3; ++i)
         channel->ConnectSrcObject(make<FbxShape>());
-    }
 
     EXPECT_THAT(fullWeights(*channel), ElementsAre(-49.9, -24.9, 100));
 }
 
 TEST_F(DeformerReading, CompletesFullWeightsThatAreTooFew) {
     auto* channel = readDeformer<FbxBlendShapeChannel>("FullWeights: *1 { a: 10 }");
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         channel->ConnectSrcObject(make<FbxShape>());
-    }
 
     EXPECT_THAT(fullWeights(*channel), ElementsAre(10, 50, 75, 100));
 }

@@ -27,9 +27,8 @@ protected:
         auto* blendShape = make<FbxBlendShape>();
         for (const int count : targetCounts) {
             auto* channel = make<FbxBlendShapeChannel>();
-            for (int i = 0; i < count; ++i) {
+            for (int i = 0; i < count; ++i)
                 channel->AddTargetShape(make<FbxShape>());
-            }
             blendShape->AddBlendShapeChannel(channel);
         }
         mesh.AddDeformer(blendShape);
@@ -313,9 +312,8 @@ TEST_F(Deformers, TargetsWithoutFullWeightsDivideTheWayEvenly) {
     EXPECT_THAT(fullWeightsOf(*channel), ElementsAre(100));
 
     auto* four = make<FbxBlendShapeChannel>();
-    for (int i = 0; i < 4; ++i) {
+    for (int i = 0; i < 4; ++i)
         four->ConnectSrcObject(make<FbxShape>());
-    }
     EXPECT_THAT(fullWeightsOf(*four), ElementsAre(25, 50, 75, 100));
 }
 

@@ -69,9 +69,8 @@ protected:
 template <class T>
 std::vector<T> itemsOf(const fbxsdk::FbxLayerElementArrayTemplate<T>& array) {
     std::vector<T> items;
-    for (int i = 0; i < array.GetCount(); ++i) {
+    for (int i = 0; i < array.GetCount(); ++i)
         items.push_back(array.GetAt(i));
-    }
     return items;
 }
 
@@ -84,18 +83,16 @@ inline std::vector<std::vector<int>> polygonsOf(const fbxsdk::FbxMesh& mesh) {
     std::vector<std::vector<int>> polygons;
     for (int p = 0; p < mesh.GetPolygonCount(); ++p) {
         std::vector<int>& corners = polygons.emplace_back();
-        for (int k = 0; k < mesh.GetPolygonSize(p); ++k) {
+        for (int k = 0; k < mesh.GetPolygonSize(p); ++k)
             corners.push_back(mesh.GetPolygonVertex(p, k));
-        }
     }
     return polygons;
 }
 
 inline void addPolygon(fbxsdk::FbxMesh& mesh, std::initializer_list<int> corners) {
     mesh.BeginPolygon();
-    for (const int corner : corners) {
+    for (const int corner : corners)
         mesh.AddPolygon(corner);
-    }
     mesh.EndPolygon();
 }
 

@@ -10,9 +10,8 @@ using testing::ElementsAre;
 namespace {
 
 void fill(FbxLayerElementArrayTemplate<int>& array, std::initializer_list<int> items) {
-    for (const int item : items) {
+    for (const int item : items)
         array.Add(item);
-    }
 }
 
 } // namespace

@@ -27,9 +27,8 @@ std::string element(const std::string& type, const std::string& mapping, const s
 
 std::string layer(int number, const std::vector<std::pair<std::string, int>>& entries) {
     std::string text = "Layer: " + std::to_string(number) + " {\nVersion: 100\n";
-    for (const auto& [type, typedIndex] : entries) {
+    for (const auto& [type, typedIndex] : entries)
         text += "LayerElement:  {\nType: \"" + type + "\"\nTypedIndex: " + std::to_string(typedIndex) + "\n}\n";
-    }
     return text + "}\n";
 }
 
@@ -66,9 +65,8 @@ TEST_F(LayerReading, KnowsEverySpellingOfMappings) {
 }
 
 TEST_F(LayerReading, LeavesOutElementsWithoutSoundMapping) {
-    for (const char* mapping : {"", "NoMappingInformation", "Missing", "bypolygonvertex"}) {
+    for (const char* mapping : {"", "NoMappingInformation", "Missing", "bypolygonvertex"})
         EXPECT_EQ(uvs(mapping, "Direct", kUvs), nullptr) << mapping;
-    }
 }
 
 TEST_F(LayerReading, ReadsDirectValues) {

@@ -36,15 +36,13 @@ TEST_F(MeshReading, ReadsListsOfOldFiles) {
 
 TEST_F(MeshReading, SpreadsManyPointsInPlace) {
     std::string records = "Vertices: *3000 { a: 0";
-    for (int i = 1; i < 3000; ++i) {
+    for (int i = 1; i < 3000; ++i)
         records += "," + std::to_string(i);
-    }
     const FbxMesh* mesh = read<FbxMesh>(records + " }");
 
     ASSERT_EQ(mesh->GetControlPointsCount(), 1000);
-    for (int i = 0; i < 1000; ++i) {
+    for (int i = 0; i < 1000; ++i)
         ASSERT_EQ(mesh->GetControlPoints()[i], FbxVector4(3.0 * i, 3.0 * i + 1, 3.0 * i + 2, 1)) << i;
-    }
 }
 
 TEST_F(MeshReading, EndsPolygonsAtInvertedIndices) {

@@ -30,9 +30,8 @@ protected:
     static FbxLayerElementNormal* addNormals(FbxMesh& mesh, FbxLayerElement::EMappingMode mapping, int count) {
         auto* normals = FbxLayerElementNormal::Create(&mesh, "");
         normals->SetMappingMode(mapping);
-        for (int i = 0; i < count; ++i) {
+        for (int i = 0; i < count; ++i)
             normals->GetDirectArray().Add(FbxVector4(i, 0, 0));
-        }
         mesh.GetLayer(0)->SetNormals(normals);
         return normals;
     }
@@ -252,9 +251,8 @@ TEST_F(FbxMeshTest, GivesIndexedNormalsByCorner) {
     FbxMesh* mesh = quadAndTriangle();
     auto* normals = addNormals(*mesh, FbxLayerElement::eByPolygonVertex, 3);
     normals->SetReferenceMode(FbxLayerElement::eIndexToDirect);
-    for (const int index : {2, 1, 0, -1, 3, 2}) {
+    for (const int index : {2, 1, 0, -1, 3, 2})
         normals->GetIndexArray().Add(index);
-    }
 
     EXPECT_EQ(normalOf(*mesh, 0, 0), 2);
     EXPECT_EQ(normalOf(*mesh, 0, 3), -1) << "a negative index";
@@ -271,9 +269,8 @@ TEST_F(FbxMeshTest, GivesNormalsByPoint) {
     EXPECT_EQ(normalOf(*mesh, 1, 2), -1) << "point 4 has none";
 
     normals->SetReferenceMode(FbxLayerElement::eIndexToDirect);
-    for (const int index : {0, 0, 1, 2}) {
+    for (const int index : {0, 0, 1, 2})
         normals->GetIndexArray().Add(index);
-    }
     EXPECT_EQ(normalOf(*mesh, 1, 0), 2);
 }
 
@@ -300,9 +297,8 @@ TEST_F(FbxMeshTest, GivesThePlaceOfTextureCoordinates) {
     EXPECT_EQ(mesh->GetTextureUVIndex(1, 1, FbxLayerElement::eTextureBump), -1);
 
     uvs->SetReferenceMode(FbxLayerElement::eIndexToDirect);
-    for (const int index : {10, 11, 12, 13, 14, 15}) {
+    for (const int index : {10, 11, 12, 13, 14, 15})
         uvs->GetIndexArray().Add(index);
-    }
     EXPECT_EQ(mesh->GetTextureUVIndex(1, 1), 15);
     EXPECT_EQ(mesh->GetTextureUVIndex(1, 2), -1) << "beyond the indices";
 
@@ -317,9 +313,8 @@ TEST_F(FbxMeshTest, RemovesAPolygonWithWhatBelongsToIt) {
     auto* materials = FbxLayerElementMaterial::Create(mesh, "");
     materials->SetMappingMode(FbxLayerElement::eByPolygon);
     materials->SetReferenceMode(FbxLayerElement::eIndexToDirect);
-    for (const int index : {7, 8, 9}) {
+    for (const int index : {7, 8, 9})
         materials->GetIndexArray().Add(index);
-    }
     mesh->GetLayer(0)->SetMaterials(materials);
     mesh->CreateLayer();
     mesh->GetLayer(1)->SetMaterials(materials);

@@ -95,10 +95,9 @@ void makeSphere(Surface& surface) {
 /// Control points at (u, v, height(u, v)).
 template <class Surface, class Height>
 void setHeights(Surface& surface, Height height) {
-    for (int v = 0; v < surface.GetVCount(); ++v) {
+    for (int v = 0; v < surface.GetVCount(); ++v)
         for (int u = 0; u < surface.GetUCount(); ++u)
             surface.SetControlPointAt(FbxVector4(u, v, height(u, v)), v * surface.GetUCount() + u);
-    }
 }
 
 /// Two by two control points on the unit square, heights 0, 1, 2, 5: z = u + 2 v + 2 u v.

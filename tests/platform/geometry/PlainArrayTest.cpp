@@ -17,9 +17,8 @@ namespace {
 std::vector<int> itemsOf(const PlainArray<int>& array) { return {array.begin(), array.end()}; }
 
 PlainArray<int>& filled(PlainArray<int>& array, int count) {
-    for (int i = 0; i < count; ++i) {
+    for (int i = 0; i < count; ++i)
         array.add(i);
-    }
     return array;
 }
 
@@ -39,9 +38,8 @@ TEST(PlainArray, KeepsItemsWhileItGrows) {
     filled(array, 100000);
 
     ASSERT_EQ(array.count(), 100000);
-    for (int i = 0; i < 100000; ++i) {
+    for (int i = 0; i < 100000; ++i)
         ASSERT_EQ(array[i], i);
-    }
 }
 
 TEST(PlainArray, FillsOnlyNewItems) {
@@ -91,9 +89,8 @@ TEST(PlainArray, TakesOneOfItsOwnItemsAsNewItem) {
     }
     array.resize(300, array[0]);
 
-    for (const int item : array) {
+    for (const int item : array)
         ASSERT_EQ(item, 5);
-    }
 }
 
 TEST(PlainArray, RemovesARunOfItems) {

@@ -20,9 +20,8 @@ class FbxShapeTest : public GeometryFixture {
 protected:
     FbxShapeTest() : base(make<FbxMesh>()), channel(make<FbxBlendShapeChannel>()) {
         base->InitControlPoints(3);
-        for (int i = 0; i < 3; ++i) {
+        for (int i = 0; i < 3; ++i)
             base->SetControlPointAt(FbxVector4(i, 10, 20), i);
-        }
         auto* blendShape = make<FbxBlendShape>();
         blendShape->AddBlendShapeChannel(channel);
         base->AddDeformer(blendShape);

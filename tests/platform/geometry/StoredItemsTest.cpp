@@ -79,13 +79,11 @@ TEST(StoredItems, AreGivenUpBehindAReaderInOrder) {
     PlainArray<int> array;
     keep(array, upTo(kMany), calls);
 
-    for (int i = 0; i < kMany / 2; ++i) {
+    for (int i = 0; i < kMany / 2; ++i)
         ASSERT_EQ(array.value(i), i);
-    }
     EXPECT_GT(calls.spoiled, kManyBytes / 4);
-    for (int i = kMany / 2; i < kMany; ++i) {
+    for (int i = kMany / 2; i < kMany; ++i)
         ASSERT_EQ(array.value(i), i);
-    }
 
     EXPECT_GT(calls.spoiled, kManyBytes / 8 * 7);
     EXPECT_EQ(calls.restored, 0);
@@ -97,9 +95,8 @@ TEST(StoredItems, AreGivenUpAlsoWhenTheyAreFew) {
         PlainArray<int> array;
         keep(array, upTo(count), calls);
 
-        for (int i = 0; i < count; ++i) {
+        for (int i = 0; i < count; ++i)
             ASSERT_EQ(array.value(i), i);
-        }
 
         EXPECT_GT(calls.spoiled, static_cast<std::size_t>(count) * sizeof(int) / 8 * 7) << count;
     }
@@ -149,11 +146,9 @@ TEST(StoredItems, ComeAgainForAReaderWhoStartsOver) {
     PlainArray<int> array;
     keep(array, upTo(kMany), calls);
 
-    for (int round = 0; round < 3; ++round) {
-        for (int i = 0; i < kMany; ++i) {
+    for (int round = 0; round < 3; ++round)
+        for (int i = 0; i < kMany; ++i)
             ASSERT_EQ(array.value(i), i) << round;
-        }
-    }
     EXPECT_EQ(calls.restored, 2);
 }
 
@@ -209,11 +204,9 @@ TEST(StoredItems, OfOneOrTwoAreReadAsAnyOthers) {
         Calls calls;
         PlainArray<int> array;
         keep(array, upTo(count), calls);
-        for (int round = 0; round < 2; ++round) {
-            for (int i = count - 1; i >= 0; --i) {
+        for (int round = 0; round < 2; ++round)
+            for (int i = count - 1; i >= 0; --i)
                 EXPECT_EQ(array.value(i), i);
-            }
-        }
     }
 }
 
@@ -232,9 +225,8 @@ TEST(StoredItems, ComeIntoMemoryForAPointerAndStayAsTheyAreChanged) {
     Calls calls;
     PlainArray<int> array;
     keep(array, upTo(kMany), calls);
-    for (int i = 0; i < kMany; ++i) {
+    for (int i = 0; i < kMany; ++i)
         ASSERT_EQ(array.value(i), i); // releases most of them
-    }
 
     int* const items = array.data();
     ASSERT_TRUE(std::equal(items, items + kMany, upTo(kMany).begin()));
@@ -248,9 +240,8 @@ TEST(StoredItems, ComeIntoMemoryForAPointerAndStayAsTheyAreChanged) {
 TEST(StoredItems, CanBeAddedToInsertedAndRemoved) {
     Calls calls;
     PlainArray<int> added, inserted, removed, resized, cleared;
-    for (PlainArray<int>* array : {&added, &inserted, &removed, &resized, &cleared}) {
+    for (PlainArray<int>* array : {&added, &inserted, &removed, &resized, &cleared})
         keep(*array, upTo(3), calls);
-    }
 
     added.add(9);
     inserted.insert(1, 9);
@@ -354,9 +345,8 @@ protected:
     static constexpr std::size_t kSize = std::size_t{1} << 20;
 
     InflatedBytesTest() : mContent(kSize, '\0') {
-        for (std::size_t i = 0; i < kSize; ++i) {
+        for (std::size_t i = 0; i < kSize; ++i)
             mContent[i] = static_cast<char>(i % 251);
-        }
     }
     InflatedBytes inflated(const std::string& stream) {
         FbxStatus status;

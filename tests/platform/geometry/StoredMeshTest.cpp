@@ -33,9 +33,8 @@ protected:
         std::iota(mPoints.begin(), mPoints.end(), 0.5);
         std::iota(mNormals.begin(), mNormals.end(), -7.25);
         std::iota(mUvs.begin(), mUvs.end(), 1.0 / 3.0);
-        for (int i = 0; i < kCorners; ++i) {
+        for (int i = 0; i < kCorners; ++i)
             mUvIndex[static_cast<std::size_t>(i)] = kPoints - 1 - i / 3;
-        }
     }
 
     ~StoredMesh() override { extensions::setMaximumThreads(1); }
@@ -78,9 +77,8 @@ private:
     }
     std::string bytes() {
         std::vector<int> corners(kCorners);
-        for (int i = 0; i < kCorners; ++i) {
+        for (int i = 0; i < kCorners; ++i)
             corners[static_cast<std::size_t>(i)] = i % 3 == 2 ? ~(i % kPoints) : i % kPoints;
-        }
         BinaryRecordBuilder file(7400);
         const Storage wanted = mStorage;
         mStorage = wanted == Storage::corrupt ? Storage::compressed : wanted;
@@ -120,12 +118,10 @@ TEST_P(SoundStoredMesh, HasItsValuesInOrderAgainAndAgain) {
     const auto& normals = normalsOf(read).GetDirectArray();
     ASSERT_EQ(normals.GetCount(), kCorners);
     for (int round = 0; round < 3; ++round) {
-        for (int i = 0; i < kPoints; ++i) {
+        for (int i = 0; i < kPoints; ++i)
             ASSERT_EQ(read->GetControlPointAt(i), item(mPoints, i));
-        }
-        for (int i = 0; i < kCorners; ++i) {
+        for (int i = 0; i < kCorners; ++i)
             ASSERT_EQ(normals.GetAt(i), item(mNormals, i));
-        }
     }
 }
 
@@ -149,12 +145,10 @@ TEST_P(SoundStoredMesh, HasAllOfThemBehindAPointer) {
     const FbxVector4* const points = read->GetControlPoints();
     const FbxVector4* const normals = normalsOf(read).GetDirectArray().GetLocked();
 
-    for (int i = 0; i < kPoints; ++i) {
+    for (int i = 0; i < kPoints; ++i)
         ASSERT_EQ(points[i], item(mPoints, i));
-    }
-    for (int i = 0; i < kCorners; ++i) {
+    for (int i = 0; i < kCorners; ++i)
         ASSERT_EQ(normals[i], item(mNormals, i));
-    }
 }
 
 TEST_P(SoundStoredMesh, KeepsWhatAHostWrites) {

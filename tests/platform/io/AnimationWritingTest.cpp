@@ -155,10 +155,9 @@ TEST_P(AnimationWriting, KeepsTheShapeBetweenKeysOfDifferentKinds) {
     FbxNode* node = addNode("node");
     FbxProperty properties[] = {node->LclTranslation, node->LclRotation, node->LclScaling};
     std::uint32_t seed = 0;
-    for (FbxProperty& property : properties) {
+    for (FbxProperty& property : properties)
         for (const char* component : {"X", "Y", "Z"})
             addMixedKeys(property.GetCurve(layer, component, /*pCreate=*/true), ++seed);
-    }
 
     FbxScene* copy = writeAndRead();
 

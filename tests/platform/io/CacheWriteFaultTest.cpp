@@ -379,9 +379,8 @@ TEST_P(CacheWriting, FailsOnADeviceThatIsFullAndPutsTheOldDataBack) {
 
     expectReason("No space left on device");
     EXPECT_EQ(folder.files(), before);
-    if (!isMax()) {
+    if (!isMax())
         EXPECT_EQ(folder.read(dataName()), "old " + dataName());
-    }
 }
 
 TEST_P(CacheWriting, FailsWhereItsFolderCannotBeWrittenTo) {

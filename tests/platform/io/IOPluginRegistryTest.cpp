@@ -23,10 +23,9 @@ protected:
 
     /// The first writer whose description contains the word; -1 without one. Hosts look for their encoding this way.
     [[nodiscard]] int firstWriterWith(const char* word) const {
-        for (int i = 0; i < registry().GetWriterFormatCount(); ++i) {
+        for (int i = 0; i < registry().GetWriterFormatCount(); ++i)
             if (registry().WriterIsFBX(i) && FbxString(registry().GetWriterFormatDescription(i)).Find(word) >= 0)
                 return i;
-        }
         return -1;
     }
 };

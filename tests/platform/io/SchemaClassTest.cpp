@@ -49,9 +49,8 @@ __attribute__((init_priority(101))) const EarlyLook kEarlyLook;
 
 TEST(SchemaClass, IsThereBeforeAnyInitialiserHasRun) {
     ASSERT_EQ(kEarlyLook.propertiesOfClasses.size(), schemaClasses().size());
-    for (std::size_t i = 0; i < schemaClasses().size(); ++i) {
+    for (std::size_t i = 0; i < schemaClasses().size(); ++i)
         EXPECT_EQ(kEarlyLook.propertiesOfClasses[i], schemaClasses()[i].info->rows.size()) << schemaClasses()[i].record;
-    }
     EXPECT_FALSE(kEarlyLook.incomplete);
     EXPECT_TRUE(kEarlyLook.nodeIsKnown);
     EXPECT_EQ(kEarlyLook.firstType, kNodeRows[0].type->GetName());
@@ -61,18 +60,15 @@ TEST(SchemaClass, IsThereBeforeAnyInitialiserHasRun) {
 TEST(SchemaClass, HasNoNameTwiceInAClass) {
     for (const SchemaClass& row : schemaClasses()) {
         std::set<std::string_view> names;
-        for (const PropertyRow& property : row.info->rows) {
+        for (const PropertyRow& property : row.info->rows)
             EXPECT_TRUE(names.insert(property.name).second) << row.templateName() << ' ' << property.name;
-        }
     }
 }
 
 TEST(SchemaClass, KnowsTheTypeOfEveryRow) {
-    for (const SchemaClass& row : schemaClasses()) {
-        for (const PropertyRow& property : row.info->rows) {
+    for (const SchemaClass& row : schemaClasses())
+        for (const PropertyRow& property : row.info->rows)
             EXPECT_TRUE(property.type->Valid()) << row.templateName() << ' ' << property.name;
-        }
-    }
 }
 
 TEST(SchemaClass, CallsAnimatableWhatFilesSpellAnimatable) {

@@ -55,10 +55,9 @@ protected:
 
     /// The record below Objects whose first text after an id is that class and whose last one is that subclass.
     static const Record& object(const Record& root, std::string_view record, std::string_view subClass) {
-        for (const Record& each : root.child("Objects")->children()) {
+        for (const Record& each : root.child("Objects")->children())
             if (each.name == record && !each.values.empty() && each.values.back().toText() == subClass)
                 return each;
-        }
         ADD_FAILURE() << "no " << record << ' ' << subClass;
         return root;
     }

@@ -112,10 +112,9 @@ TEST_F(FbxPropertyTest, CostsNothingUntilItIsChanged) {
 
 TEST_F(FbxPropertyTest, KeepsValuesApartHoweverManyAreChanged) {
     std::vector<FbxProperty> changed;
-    for (FbxProperty each = node->GetFirstProperty(); each.IsValid(); each = node->GetNextProperty(each)) {
+    for (FbxProperty each = node->GetFirstProperty(); each.IsValid(); each = node->GetNextProperty(each))
         if (each.GetPropertyDataType().GetType() == eFbxDouble3)
             changed.push_back(each);
-    }
     ASSERT_GT(changed.size(), 10U);
     for (std::size_t i = changed.size(); i-- > 0;)
         changed[i].Set(FbxDouble3(static_cast<double>(i), 0, 0));

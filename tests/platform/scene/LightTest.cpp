@@ -57,10 +57,8 @@ TEST_F(FbxLightTest, HasTheDefaultsOfFiles) {
         EXPECT_EQ(each.member.Get(), each.value) << each.name;
         EXPECT_TRUE(each.member.GetFlag(FbxPropertyFlags::eAnimatable)) << each.name;
     }
-    for (const auto* door :
-         {&light->LeftBarnDoor, &light->RightBarnDoor, &light->TopBarnDoor, &light->BottomBarnDoor}) {
+    for (const auto* door : {&light->LeftBarnDoor, &light->RightBarnDoor, &light->TopBarnDoor, &light->BottomBarnDoor})
         EXPECT_EQ(door->Get(), 20.0F);
-    }
 }
 
 TEST_F(FbxLightTest, AnimatesItsColorAlthoughOtherAttributesDoNot) {

@@ -389,9 +389,8 @@ TEST_F(NodeEvaluationTest, MovesChildrenWithTheirAnimatedParents) {
     middle->LclTranslation.Set(FbxDouble3(10, 0, 0));
     leaf->LclTranslation.Set(FbxDouble3(1, 0, 0));
 
-    for (const double time : {1.0, 0.0, 0.5, 0.5, 0.25, 1.0}) {
+    for (const double time : {1.0, 0.0, 0.5, 0.5, 0.25, 1.0})
         EXPECT_NEAR(globalX(leaf, seconds(time)), 100 * time + (1 + 2 * time) * 11, 1e-3) << time;
-    }
     EXPECT_EQ(globalX(leaf), 11.0);
 }
 

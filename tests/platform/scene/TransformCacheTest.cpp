@@ -208,10 +208,9 @@ protected:
         keys(chain.front()->LclTranslation, layer, "X", {{0, 0}, {2000, 2000}});
     }
     void readAll(const std::vector<FbxTime>& times) {
-        for (FbxNode* node : chain) {
+        for (FbxNode* node : chain)
             for (const FbxTime& time : times)
                 EXPECT_NEAR(globalX(node, time), time.GetSecondDouble(), 1e-3);
-        }
     }
     static std::vector<FbxTime> ascending(int count) {
         std::vector<FbxTime> times;

@@ -17,7 +17,8 @@ using namespace fbxsdk;
 using namespace fbxsdk::detail;
 
 NameIndex indexOf(std::span<const PropertyRow> rows) {
-    return NameIndex(rows, [](const PropertyRow& row) { return row.name; });
+    return NameIndex(
+        rows, [](const PropertyRow& row) { return row.name; });
 }
 
 int find(const NameIndex& index, std::string_view name) { return index.find(NameKey(name)); }

@@ -42,14 +42,12 @@ std::size_t componentCount(EFbxType type) {
 std::string lineOf(const PropertyRow& row) {
     const PropertyTypeInfo& type = *row.type->info();
     std::string line;
-    for (const char* text : {row.name, type.typeName, type.subTypeName, row.flags}) {
+    for (const char* text : {row.name, type.typeName, type.subTypeName, row.flags})
         line += (line.empty() ? "\"" : ", \"") + std::string(text) + '"';
-    }
     if (type.type == eFbxString)
         return line + ", \"" + row.text + '"';
-    for (std::size_t i = 0; i < componentCount(type.type); ++i) {
+    for (std::size_t i = 0; i < componentCount(type.type); ++i)
         line += (i == 0 ? ", " : ",") + shortest(row.numbers[i]);
-    }
     return line;
 }
 

@@ -52,12 +52,11 @@ private:
                 mObjects.addAttribute(model, kind, {}, legacyAttributeProperties(mBuilder, kind, record), &body);
             mObjects.at(attribute).name = mObjects.at(model).name;
         }
-        for (const Record& child : record.children()) {
+        for (const Record& child : record.children())
             if (child.name == "Material")
                 addMaterial(child, model);
             else if (child.name == "Texture")
                 mBuilder.connect(mObjects.add(child.value(0).toText(), "Texture", "", &child), model);
-        }
     }
 
     /// Every Model holds a copy of its materials; equal ones of the same name are merged.

@@ -27,8 +27,9 @@ bool isRoot(std::string_view fullName) {
 constexpr std::string_view kPointRecords[] = {"Vertices", "PolygonVertexIndex", "Points", "KnotVector", "KnotVectorU"};
 
 bool hasPoints(const Record& model) {
-    return std::any_of(std::begin(kPointRecords), std::end(kPointRecords),
-                       [&](std::string_view name) { return model.child(name) != nullptr; });
+    return std::any_of(
+        std::begin(kPointRecords), std::end(kPointRecords),
+        [&](std::string_view name) { return model.child(name) != nullptr; });
 }
 
 /// The properties of a Model record, separated: its own, and those of its attribute.
@@ -83,7 +84,8 @@ struct SharedAttribute {
 
 bool sameProperties(std::span<const DocumentProperty> a, std::span<const DocumentProperty> b) {
     return std::equal(
-        a.begin(), a.end(), b.begin(), b.end(), [](const DocumentProperty& left, const DocumentProperty& right) {
+        a.begin(), a.end(), b.begin(), b.end(),
+        [](const DocumentProperty& left, const DocumentProperty& right) {
             return left.name == right.name && left.typeName == right.typeName && sameValues(left.values, right.values);
         });
 }

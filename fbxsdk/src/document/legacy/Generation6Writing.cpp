@@ -28,10 +28,12 @@ constexpr struct {
                         {"EnableBarnDoor", 0}};
 
 bool goesWithoutSaying(const DocumentProperty& property) {
-    return property.values.size() == 1 &&
-           std::any_of(std::begin(kNewerProperties), std::end(kNewerProperties), [&](const auto& row) {
-               return row.name == property.name && row.value == property.values.front().toReal();
-           });
+    return property.values.size() == 1 && std::any_of(
+                                              std::begin(kNewerProperties), std::end(kNewerProperties),
+                                              [&](const auto& row) {
+                                                  return row.name == property.name &&
+                                                         row.value == property.values.front().toReal();
+                                              });
 }
 
 /// The order of kinds within Objects, and that of their counts; others follow.
@@ -73,10 +75,9 @@ private:
 
     void writeDefinitions() {
         std::vector<ObjectCount> kinds;
-        for (const DocumentObject& object : mDocument.objects) {
+        for (const DocumentObject& object : mDocument.objects)
             if (mLayout.standsAlone(object))
                 count(kinds, object.record);
-        }
         count(kinds, "SceneInfo");
         count(kinds, "GlobalSettings");
         std::stable_sort(kinds.begin(), kinds.end(), [](const ObjectCount& a, const ObjectCount& b) {
@@ -109,9 +110,11 @@ private:
         mSink.heading("Object properties");
         const BlockScope block(mSink, "Objects");
         const std::vector<const DocumentObject*> objects = objectsInOrder();
-        const auto behindSceneInfo = std::find_if(objects.begin(), objects.end(), [](const DocumentObject* object) {
-            return rankIn(kObjectOrder, object->record) > rankIn(kObjectOrder, "SceneInfo");
-        });
+        const auto behindSceneInfo = std::find_if(
+            objects.begin(), objects.end(),
+            [](const DocumentObject* object) {
+                return rankIn(kObjectOrder, object->record) > rankIn(kObjectOrder, "SceneInfo");
+            });
         std::for_each(objects.begin(), behindSceneInfo, [this](const DocumentObject* object) { writeObject(*object); });
         writeSceneInfo(mDocument, mTraits, mSink);
         std::for_each(behindSceneInfo, objects.end(), [this](const DocumentObject* object) { writeObject(*object); });
@@ -120,10 +123,9 @@ private:
 
     [[nodiscard]] std::vector<const DocumentObject*> objectsInOrder() const {
         std::vector<const DocumentObject*> objects;
-        for (const DocumentObject& object : mDocument.objects) {
+        for (const DocumentObject& object : mDocument.objects)
             if (mLayout.standsAlone(object))
                 objects.push_back(&object);
-        }
         std::stable_sort(objects.begin(), objects.end(), [](const DocumentObject* a, const DocumentObject* b) {
             return rankIn(kObjectOrder, a->record) < rankIn(kObjectOrder, b->record);
         });
@@ -182,12 +184,11 @@ private:
     /// Those with other names here are last.
     void writeAttributeProperties(const DocumentObject& attribute) {
         std::vector<const DocumentProperty*> renamed;
-        for (const DocumentProperty& property : attribute.properties) {
+        for (const DocumentProperty& property : attribute.properties)
             if (legacyPropertyName(attribute.subClass, property.name) != property.name)
                 renamed.push_back(&property);
             else
                 writeProperty(property, attribute.subClass, std::string(property.flags) + kAttributeFlagLetter);
-        }
         for (const DocumentProperty* property : renamed)
             writeProperty(*property, attribute.subClass, std::string(property->flags) + kAttributeFlagLetter);
     }
@@ -203,11 +204,10 @@ private:
         const BlockScope block(mSink, "GlobalSettings");
         writeInteger(mSink, "Version", 1000);
         const BlockScope properties(mSink, "Properties60");
-        for (const DocumentProperty& property : mDocument.globalSettings) {
+        for (const DocumentProperty& property : mDocument.globalSettings)
             if (std::find(std::begin(kNewerSettings), std::end(kNewerSettings), property.name) ==
                 std::end(kNewerSettings))
                 writeProperty60(mSink, property, property.flags);
-        }
     }
 
     void writeConnections() {
@@ -301,10 +301,9 @@ private:
     /// The second way in which files state it.
     [[nodiscard]] std::string frameRate() const {
         const std::int64_t mode = setting("TimeMode").toInteger();
-        for (const LegacyRateRow& rate : kLegacyRates) {
+        for (const LegacyRateRow& rate : kLegacyRates)
             if (rate.timeMode == mode)
                 return std::string(rate.framesPerSecond);
-        }
         return std::to_string(setting("CustomFrameRate").toReal());
     }
 

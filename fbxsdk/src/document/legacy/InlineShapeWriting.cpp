@@ -34,17 +34,15 @@ public:
     explicit ShapeMover(Document& document) : mDocument(document) {
         for (std::size_t i = 0; i < document.objects.size(); ++i)
             mIndex.emplace(document.objects[i].id, i);
-        for (const DocumentConnection& connection : document.connections) {
+        for (const DocumentConnection& connection : document.connections)
             if (connection.sourceProperty.empty() && connection.destinationProperty.empty())
                 mSources[connection.destination].push_back(connection.source);
-        }
     }
 
     void move() {
-        for (DocumentObject& object : mDocument.objects) {
+        for (DocumentObject& object : mDocument.objects)
             if (object.record == "Geometry" && object.subClass != "Shape")
                 moveInto(object);
-        }
         if (mRemoved.empty())
             return;
         moveAnimation();
@@ -163,7 +161,8 @@ private:
     }
 
     void removeMoved() {
-        std::erase_if(mDocument.objects, [&](const DocumentObject& object) { return mRemoved.contains(object.id); });
+        std::erase_if(
+            mDocument.objects, [&](const DocumentObject& object) { return mRemoved.contains(object.id); });
         std::erase_if(mDocument.connections, [&](const DocumentConnection& connection) {
             return mRemoved.contains(connection.source) || mRemoved.contains(connection.destination);
         });

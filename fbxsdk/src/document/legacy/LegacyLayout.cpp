@@ -96,10 +96,9 @@ LegacyLayout::Driven LegacyLayout::drivenBy(std::string_view stack) const {
     if (members == mMembers.end())
         return {};
     std::set<const DocumentConnection*> connections; // in their order
-    for (const std::int64_t node : members->second) {
+    for (const std::int64_t node : members->second)
         if (const auto driving = mDriving.find(node); driving != mDriving.end())
             connections.insert(driving->second.begin(), driving->second.end());
-    }
     std::map<std::int64_t, std::vector<DrivenProperty>> byObject;
     for (const DocumentConnection* connection : connections) {
         DrivenProperty driven{connection->destinationProperty, find(connection->source), {}};

@@ -26,12 +26,11 @@ LegacyNames::LegacyNames(const std::vector<DocumentObject>& objects) {
     mNames.emplace(0, LegacyName{kRootClass, std::string(kRootName)});
     std::unordered_set<std::string> taken{keyOf(kRootClass, kRootName)};
     std::vector<const DocumentObject*> clashing;
-    for (const DocumentObject& object : objects) {
+    for (const DocumentObject& object : objects)
         if (taken.insert(keyOf(object.content->nameClass, object.name)).second)
             mNames.emplace(object.id, LegacyName{object.content->nameClass, std::string(object.name)});
         else
             clashing.push_back(&object);
-    }
     std::unordered_map<std::string, int> numbers; // the last one that was used after a name
     for (const DocumentObject* object : clashing) {
         const std::string base = std::string(object->name) + "_ncl1_";

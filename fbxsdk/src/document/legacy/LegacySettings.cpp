@@ -15,8 +15,9 @@ namespace detail {
 namespace {
 
 bool hasSetting(const Document& document, std::string_view name) {
-    return std::any_of(document.globalSettings.begin(), document.globalSettings.end(),
-                       [&](const DocumentProperty& property) { return property.name == name; });
+    return std::any_of(
+        document.globalSettings.begin(), document.globalSettings.end(),
+        [&](const DocumentProperty& property) { return property.name == name; });
 }
 
 void addSetting(DocumentBuilder& builder, const DocumentProperty& setting) {
@@ -66,10 +67,9 @@ double rateOf(std::string_view text) {
 
 std::int64_t timeModeOf(double rate) {
     constexpr double kTolerance = 0.005;
-    for (const LegacyRateRow& row : kLegacyRates) {
+    for (const LegacyRateRow& row : kLegacyRates)
         if (row.read && std::abs(rateOf(row.framesPerSecond) - rate) < kTolerance)
             return row.timeMode;
-    }
     return kCustomTimeMode;
 }
 

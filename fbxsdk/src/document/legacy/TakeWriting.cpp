@@ -30,8 +30,9 @@ constexpr std::array<std::string_view, 4> kAxes{"X", "Y", "Z", "W"};
 constexpr std::string_view kPrefix = "d|";
 
 bool isTransform(std::string_view property) {
-    return std::any_of(std::begin(kTransformRows), std::end(kTransformRows),
-                       [&](const TransformRow& row) { return row.property == property; });
+    return std::any_of(
+        std::begin(kTransformRows), std::end(kTransformRows),
+        [&](const TransformRow& row) { return row.property == property; });
 }
 
 class TakeWriter {

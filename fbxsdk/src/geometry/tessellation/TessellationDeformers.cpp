@@ -35,10 +35,9 @@ public:
     }
     template <class Visit>
     void visit(Visit visitPoint) const {
-        for (std::size_t point = 0; point < mSums.size(); ++point) {
+        for (std::size_t point = 0; point < mSums.size(); ++point)
             if (mTouched[point])
                 visitPoint(static_cast<int>(point), mSums[point]);
-        }
     }
 
 private:
@@ -70,7 +69,8 @@ public:
         }
         PointSums<double> spread(mGrid->pointCount());
         weights.visit([&](int controlPoint, double weight) {
-            mGrid->spread(controlPoint, [&](int point, double share) { spread.add(point, share * weight); });
+            mGrid->spread(
+                controlPoint, [&](int point, double share) { spread.add(point, share * weight); });
         });
         spread.visit([&](int point, double weight) { to.AddControlPointIndex(point, weight); });
     }
@@ -169,10 +169,9 @@ void carryAll(FbxMesh& mesh, const FbxGeometry& from, const PointCarrier& carrie
 
 /// The parts of a deformer; links are not among them.
 void destroyParts(FbxDeformer& deformer) {
-    if (auto* skin = FbxCast<FbxSkin>(&deformer)) {
+    if (auto* skin = FbxCast<FbxSkin>(&deformer))
         while (FbxCluster* cluster = skin->GetCluster(0))
             cluster->Destroy();
-    }
     if (auto* blendShape = FbxCast<FbxBlendShape>(&deformer)) {
         while (FbxBlendShapeChannel* channel = blendShape->GetBlendShapeChannel(0)) {
             while (FbxShape* shape = channel->GetTargetShape(0))
@@ -186,10 +185,9 @@ void destroyParts(FbxDeformer& deformer) {
 
 std::int64_t numbersPerPoint(const FbxGeometry& geometry) {
     std::int64_t count = geometry.GetShapeCount();
-    for (int i = 0; i < geometry.GetDeformerCount(); ++i) {
+    for (int i = 0; i < geometry.GetDeformerCount(); ++i)
         if (const auto* skin = FbxCast<FbxSkin>(geometry.GetDeformer(i)))
             count += skin->GetClusterCount();
-    }
     return count;
 }
 

@@ -69,10 +69,9 @@ public:
         std::vector<bool> used(mPoints.size());
         for (const BasisTerm& term : u.terms)
             used[static_cast<std::size_t>(term.point)] = true;
-        for (std::size_t column = 0; column < used.size(); ++column) {
+        for (std::size_t column = 0; column < used.size(); ++column)
             if (used[column])
                 mUsed.push_back(column);
-        }
     }
 
     void blend(const std::vector<Vector>& controlPoints, std::span<const BasisTerm> v) {
@@ -274,10 +273,9 @@ TessellationGrid::Shares TessellationGrid::invert(const SampledDirection& direct
         shares.starts[point] += shares.starts[point - 1];
     shares.all.resize(terms.size());
     std::vector<std::size_t> next(shares.starts.begin(), shares.starts.end() - 1);
-    for (int sample = 0; sample < direction.distinctCount(); ++sample) {
+    for (int sample = 0; sample < direction.distinctCount(); ++sample)
         for (const BasisTerm& term : direction.termsOf(sample))
             shares.all[next[static_cast<std::size_t>(term.point)]++] = {sample, term.weight};
-    }
     return shares;
 }
 

@@ -22,10 +22,9 @@ void visitCorners(const TessellationGrid& grid, Visit visit) {
     constexpr int kBack[6][2] = {{0, 0}, {1, 1}, {1, 0}, {0, 0}, {0, 1}, {1, 1}};
     const auto& corners = grid.flipped() ? kBack : kFront;
     for (int v = 0; v + 1 < grid.v().sampleCount(); ++v) {
-        for (int u = 0; u + 1 < grid.u().sampleCount(); ++u) {
+        for (int u = 0; u + 1 < grid.u().sampleCount(); ++u)
             for (const auto& corner : corners)
                 visit(u + corner[0], v + corner[1]);
-        }
     }
 }
 
@@ -73,10 +72,9 @@ void addUvs(FbxMesh& mesh, FbxLayer& layer, const TessellationGrid& grid) {
     element->SetReferenceMode(FbxLayerElement::eIndexToDirect);
     FbxLayerElementArrayTemplate<FbxVector2>& uvs = element->GetDirectArray();
     uvs.items().reserve(grid.u().sampleCount() * grid.v().sampleCount());
-    for (const double v : grid.v().places) {
+    for (const double v : grid.v().places)
         for (const double u : grid.u().places)
             uvs.Add(FbxVector2(u, v));
-    }
     FbxLayerElementArrayTemplate<int>& indices = element->GetIndexArray();
     indices.items().resizeUninitialised(mesh.GetPolygonVertexCount());
     int corner = 0;

@@ -156,10 +156,12 @@ TEST_F(TessellationGridOf, ControlPointsHaveRationalSharesThatAddUpToOne) {
     std::vector<double> sums(static_cast<std::size_t>(grid->pointCount()));
     std::vector<FbxVector4> points(sums.size(), FbxVector4(0, 0, 0));
     for (int i = 0; i < grid->controlPointCount(); ++i) {
-        grid->spread(i, [&](int point, double share) {
-            sums[static_cast<std::size_t>(point)] += share;
-            points[static_cast<std::size_t>(point)] += surface->GetControlPointAt(i) * share;
-        });
+        grid->spread(
+            i,
+            [&](int point, double share) {
+                sums[static_cast<std::size_t>(point)] += share;
+                points[static_cast<std::size_t>(point)] += surface->GetControlPointAt(i) * share;
+            });
     }
     for (std::size_t i = 0; i < sums.size(); ++i) {
         EXPECT_NEAR(sums[i], 1.0, 1e-12);
