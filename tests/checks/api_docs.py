@@ -6,7 +6,7 @@
 Usage: api_docs.py PRODUCT SCRATCH_FOLDER    what ctest runs; fails when there are more than recorded, or fewer
        api_docs.py PRODUCT --list            all of them, as FILE:LINE: SYMBOL
 
-PRODUCT is `library` or `platform`; its number stands in undocumented_PRODUCT.txt and only ever falls.
+PRODUCT is `library` or `platform`; its number is in undocumented_PRODUCT.txt and only ever falls.
 """
 
 import subprocess

@@ -18,6 +18,7 @@ TABLES = (
     "schema/OldNames.h",
     "schema/ProducerCameras.h",
     "schema/Spellings.h",
+    "schema/SubClasses.h",
     "container/FileFormat.h",
 )
 # Numbers with names: that one may be spelt as a number nowhere else.
@@ -28,6 +29,7 @@ OTHER_MEANINGS = {
     "Normals": "a record of models before 6.0, and of shapes",
     "Materials": "a record of models before 6.0",
     "Camera": "a kind of attribute",
+    "Shape": "a record of geometry before 7.0",
     "Light": "a kind of attribute",
     "Marker": "the type flags of markers",
     "LimbNode": "the kind that the type flags of skeletons mean before 6.0",
@@ -73,11 +75,11 @@ def violations(root):
         text = without_comments_and_includes(path.read_text(encoding="utf-8"))
         if place.parts[0] != "schema":
             for spelling in sorted(literals(path) & (spellings.keys() - OTHER_MEANINGS.keys())):
-                yield f"fbxsdk/src/{place}: \"{spelling}\" stands in {spellings[spelling]}"
+                yield f"fbxsdk/src/{place}: \"{spelling}\" is in {spellings[spelling]}"
         if str(place) not in NUMBERS:
             for number, name in numbers.items():
                 if re.search(rf"\b{number}\b", text):
-                    yield f"fbxsdk/src/{place}: {number} stands in {name}"
+                    yield f"fbxsdk/src/{place}: {number} is in {name}"
 
 
 def main():

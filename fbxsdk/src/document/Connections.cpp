@@ -10,6 +10,7 @@
 
 #include "document/DocumentBuilder.h"
 #include "schema/ProducerCameras.h"
+#include "schema/SubClasses.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -29,10 +30,10 @@ constexpr ConnectionLayout kConnectionLayouts[] = {
 
 /// Models of these names stay out of the node tree when no connection includes them: they are the application's views.
 bool isViewModel(const DocumentObject& object) {
-    if (object.subClass == "CameraSwitcher")
+    if (object.subClass == SubClass::kCameraSwitcher)
         return object.name == kCameraSwitcherName;
-    return object.subClass == "Camera" && std::find(kProducerCameraNames.begin(), kProducerCameraNames.end(),
-                                                    object.name) != kProducerCameraNames.end();
+    return object.subClass == SubClass::kCamera && std::find(kProducerCameraNames.begin(), kProducerCameraNames.end(),
+                                                             object.name) != kProducerCameraNames.end();
 }
 
 bool endsExist(const Document& document, const DocumentConnection& connection) {

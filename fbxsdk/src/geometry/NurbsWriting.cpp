@@ -16,6 +16,7 @@
 #include "document/RecordWriting.h"
 #include "geometry/NurbsNumbers.h"
 #include "schema/Spellings.h"
+#include "schema/SubClasses.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -64,7 +65,7 @@ void writeSurface(const FbxNurbsSurfaceBase& surface, const SurfaceNames& names,
 
 void writeCurve(const FbxNurbsCurve& curve, RecordSink& sink) {
     writeInteger(sink, "GeometryVersion", kGeometryVersion);
-    writeText(sink, "Type", "NurbsCurve");
+    writeText(sink, "Type", SubClass::kNurbsCurve);
     writeInteger(sink, "NurbsCurveVersion", kVersion);
     writeInteger(sink, "Order", curve.GetOrder());
     writeInteger(sink, "Dimension", curve.GetDimension());
@@ -80,7 +81,7 @@ void writeCurve(const FbxNurbsCurve& curve, RecordSink& sink) {
 std::string_view patchTypeName(FbxPatch::EType type) { return spellingOf(kPatchTypes, type, FbxPatch::eBezier); }
 
 void writePatch(const FbxPatch& patch, RecordSink& sink) {
-    writeText(sink, "Type", "Patch");
+    writeText(sink, "Type", SubClass::kPatch);
     writeInteger(sink, "PatchVersion", kVersion);
     writeTexts(sink, "PatchType", {patchTypeName(patch.GetPatchUType()), patchTypeName(patch.GetPatchVType())});
     writeIntegers(sink, "Dimensions", {patch.GetUCount(), patch.GetVCount()});
@@ -94,7 +95,7 @@ void writePatch(const FbxPatch& patch, RecordSink& sink) {
 
 void writeLine(FbxLine& line, RecordSink& sink) {
     writeInteger(sink, "GeometryVersion", kGeometryVersion);
-    writeText(sink, "Type", "Line");
+    writeText(sink, "Type", SubClass::kLine);
     writeInteger(sink, "LineVersion", kVersion);
     writePoints(sink, line, 3);
     // The end of a polyline is marked in the stored index, which GetPointIndexAt would decode.
@@ -103,12 +104,12 @@ void writeLine(FbxLine& line, RecordSink& sink) {
 
 void writeTrimNurbsSurface(const FbxTrimNurbsSurface& surface, RecordSink& sink) {
     writeInteger(sink, "TrimmedNurbVersion", kVersion);
-    writeText(sink, "Type", "TrimNurbsSurface");
+    writeText(sink, "Type", SubClass::kTrimNurbsSurface);
     writeInteger(sink, "FlipNormals", surface.GetFlipNormals() ? 1 : 0);
 }
 
 void writeBoundary(RecordSink& sink) {
-    writeText(sink, "Type", "Boundary");
+    writeText(sink, "Type", SubClass::kBoundary);
     writeInteger(sink, "BoundaryVersion", kVersion);
 }
 
@@ -116,9 +117,9 @@ void writeBoundary(RecordSink& sink) {
 
 void writeNurbsRecords(FbxGeometryBase& geometry, RecordSink& sink) {
     if (const auto* nurbs = FbxCast<FbxNurbs>(&geometry))
-        writeSurface(*nurbs, {"Nurb", "NurbVersion", "NurbOrder"}, sink);
+        writeSurface(*nurbs, {SubClass::kNurb, "NurbVersion", "NurbOrder"}, sink);
     else if (const auto* surface = FbxCast<FbxNurbsSurface>(&geometry))
-        writeSurface(*surface, {"NurbsSurface", "NurbsSurfaceVersion", "NurbsSurfaceOrder"}, sink);
+        writeSurface(*surface, {SubClass::kNurbsSurface, "NurbsSurfaceVersion", "NurbsSurfaceOrder"}, sink);
     else if (const auto* curve = FbxCast<FbxNurbsCurve>(&geometry))
         writeCurve(*curve, sink);
     else if (const auto* patch = FbxCast<FbxPatch>(&geometry))

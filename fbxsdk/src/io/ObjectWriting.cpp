@@ -31,6 +31,7 @@
 #include "geometry/GeometryWriting.h"
 #include "object/SceneMembers.h"
 #include "schema/Spellings.h"
+#include "schema/SubClasses.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -68,7 +69,7 @@ WriteRecords versionRecord(int version) {
 std::string_view kindOf(FbxNode& node) {
     const FbxNodeAttribute* attribute = node.GetNodeAttribute();
     const SchemaClass* schema = attribute ? findSchema(attribute->GetClassId()) : nullptr;
-    return schema ? writtenSubClass(*attribute, *schema) : "Null";
+    return schema ? writtenSubClass(*attribute, *schema) : SubClass::kNull;
 }
 
 void writeNode(const Writing& writing) {
@@ -97,7 +98,7 @@ void writeVector(RecordSink& sink, std::string_view name, const FbxDouble3& vect
 /// Some readers look at these records only, so they repeat the properties.
 void writeCameraRecords(RecordSink& sink, const FbxCamera& camera) {
     constexpr int kGeometryVersion = 124;
-    writeText(sink, "TypeFlags", "Camera");
+    writeText(sink, "TypeFlags", SubClass::kCamera);
     writeInteger(sink, "GeometryVersion", kGeometryVersion);
     writeVector(sink, "Position", camera.Position.Get());
     writeVector(sink, "Up", camera.UpVector.Get());
@@ -117,7 +118,7 @@ void writeCamera(const Writing& writing) {
 
 void writeCameraStereo(const Writing& writing) {
     writing.target.content->after = [](RecordSink& sink, const VersionTraits&) {
-        writeText(sink, "TypeFlags", "CameraStereo");
+        writeText(sink, "TypeFlags", SubClass::kCameraStereo);
         writeInteger(sink, "Version", 100);
     };
 }
@@ -137,18 +138,17 @@ void writeCameraSwitcher(const Writing& writing) {
 
 void writeLight(const Writing& writing) {
     writing.target.content->after = [](RecordSink& sink, const VersionTraits&) {
-        writeText(sink, "TypeFlags", "Light");
+        writeText(sink, "TypeFlags", SubClass::kLight);
         writeInteger(sink, "GeometryVersion", 124);
     };
 }
 
-template <const char* const& flags>
+template <const std::string_view& flags>
 void writeTypeFlags(const Writing& writing) {
     writing.target.content->after = [](RecordSink& sink, const VersionTraits&) { writeText(sink, "TypeFlags", flags); };
 }
-constexpr const char* kNullFlags = "Null";
-constexpr const char* kMarkerFlags = "Marker";
-constexpr const char* kSkeletonFlags = "Skeleton";
+constexpr std::string_view kMarkerFlags = "Marker";
+constexpr std::string_view kSkeletonFlags = "Skeleton";
 
 /// The record states the material's class; a name that states another would be read as another.
 std::string shadingModelOf(const FbxSurfaceMaterial& material) {
@@ -214,7 +214,9 @@ void writeLayeredTexture(const Writing& writing) {
 
 void writeVideo(const Writing& writing) {
     auto& video = writing.as<FbxVideo>();
-    writing.target.content->before = [](RecordSink& sink, const VersionTraits&) { writeText(sink, "Type", "Clip"); };
+    writing.target.content->before = [](RecordSink& sink, const VersionTraits&) {
+        writeText(sink, "Type", SubClass::kClip);
+    };
     writing.target.content->after = [&video](RecordSink& sink, const VersionTraits&) {
         writeInteger(sink, "UseMipMap", 0);
         writeText(sink, "Filename", video.GetFileName().Buffer());
@@ -299,7 +301,7 @@ const ClassWriter kWriters[] = {
     {FbxCamera::ClassId, writeCamera},
     {FbxCameraSwitcher::ClassId, writeCameraSwitcher},
     {FbxLight::ClassId, writeLight},
-    {FbxNull::ClassId, writeTypeFlags<kNullFlags>},
+    {FbxNull::ClassId, writeTypeFlags<SubClass::kNull>},
     {FbxMarker::ClassId, writeTypeFlags<kMarkerFlags>},
     {FbxSkeleton::ClassId, writeTypeFlags<kSkeletonFlags>},
     {FbxGeometryBase::ClassId, writeGeometry},

@@ -4,6 +4,7 @@
 
 #include "schema/Schema.h"
 #include "schema/Spellings.h"
+#include "schema/SubClasses.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -25,39 +26,39 @@ constexpr std::span<const PropertyRow> kNoRows;
 constinit const SchemaClass kClasses[] = {
     {"Model", kAny, "Model", &kFbxNodeInfo, kNodeRows},
 
-    {"NodeAttribute", "Null", "NodeAttribute", &kFbxNullInfo, kNullRows},
+    {"NodeAttribute", SubClass::kNull, "NodeAttribute", &kFbxNullInfo, kNullRows},
     {"NodeAttribute", kSkeletonTypes[2], "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
     {"NodeAttribute", kSkeletonTypes[1], "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
     {"NodeAttribute", kSkeletonTypes[0], "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
     {"NodeAttribute", kSkeletonTypes[3], "NodeAttribute", &kFbxSkeletonInfo, kSkeletonRows},
-    {"NodeAttribute", "Camera", "NodeAttribute", &kFbxCameraInfo, kCameraRows},
-    {"NodeAttribute", "CameraStereo", "NodeAttribute", &kFbxCameraStereoInfo, kCameraStereoRows},
-    {"NodeAttribute", "CameraSwitcher", "NodeAttribute", &kFbxCameraSwitcherInfo, kCameraSwitcherRows},
-    {"NodeAttribute", "Light", "NodeAttribute", &kFbxLightInfo, kLightRows},
+    {"NodeAttribute", SubClass::kCamera, "NodeAttribute", &kFbxCameraInfo, kCameraRows},
+    {"NodeAttribute", SubClass::kCameraStereo, "NodeAttribute", &kFbxCameraStereoInfo, kCameraStereoRows},
+    {"NodeAttribute", SubClass::kCameraSwitcher, "NodeAttribute", &kFbxCameraSwitcherInfo, kCameraSwitcherRows},
+    {"NodeAttribute", SubClass::kLight, "NodeAttribute", &kFbxLightInfo, kLightRows},
     {"NodeAttribute", kMarkerTypes[0], "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
     {"NodeAttribute", kMarkerTypes[1], "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
     {"NodeAttribute", kMarkerTypes[2], "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
     {"NodeAttribute", kMarkerTypes[3], "NodeAttribute", &kFbxMarkerInfo, kMarkerRows},
-    {"NodeAttribute", "LodGroup", "NodeAttribute", &kFbxLODGroupInfo, kLodGroupRows},
-    {"NodeAttribute", "OpticalReference", "NodeAttribute", &kFbxOpticalReferenceInfo, kNodeAttributeRows},
-    {"NodeAttribute", "CachedEffect", "NodeAttribute", &kFbxCachedEffectInfo, kNodeAttributeRows},
+    {"NodeAttribute", SubClass::kLodGroup, "NodeAttribute", &kFbxLODGroupInfo, kLodGroupRows},
+    {"NodeAttribute", SubClass::kOpticalReference, "NodeAttribute", &kFbxOpticalReferenceInfo, kNodeAttributeRows},
+    {"NodeAttribute", SubClass::kCachedEffect, "NodeAttribute", &kFbxCachedEffectInfo, kNodeAttributeRows},
     {"NodeAttribute", kAny, "NodeAttribute", &kFbxNodeAttributeInfo, kNodeAttributeRows},
 
-    {"Geometry", "Mesh", "Geometry", &kFbxMeshInfo, kMeshRows},
-    {"Geometry", "Shape", "Geometry", &kFbxShapeInfo, kMeshRows},
-    {"Geometry", "NurbsSurface", "Geometry", &kFbxNurbsSurfaceInfo, kMeshRows},
-    {"Geometry", "NurbsCurve", "Geometry", &kFbxNurbsCurveInfo, kMeshRows},
-    {"Geometry", "TrimNurbsSurface", "Geometry", &kFbxTrimNurbsSurfaceInfo, kMeshRows},
-    {"Geometry", "Boundary", "Geometry", &kFbxBoundaryInfo, kMeshRows},
-    {"Geometry", "Nurb", "Geometry", &kFbxNurbsInfo, kMeshRows},
-    {"Geometry", "Patch", "Geometry", &kFbxPatchInfo, kMeshRows},
-    {"Geometry", "Line", "Geometry", &kFbxLineInfo, kLineRows},
+    {"Geometry", SubClass::kMesh, "Geometry", &kFbxMeshInfo, kMeshRows},
+    {"Geometry", SubClass::kShape, "Geometry", &kFbxShapeInfo, kMeshRows},
+    {"Geometry", SubClass::kNurbsSurface, "Geometry", &kFbxNurbsSurfaceInfo, kMeshRows},
+    {"Geometry", SubClass::kNurbsCurve, "Geometry", &kFbxNurbsCurveInfo, kMeshRows},
+    {"Geometry", SubClass::kTrimNurbsSurface, "Geometry", &kFbxTrimNurbsSurfaceInfo, kMeshRows},
+    {"Geometry", SubClass::kBoundary, "Geometry", &kFbxBoundaryInfo, kMeshRows},
+    {"Geometry", SubClass::kNurb, "Geometry", &kFbxNurbsInfo, kMeshRows},
+    {"Geometry", SubClass::kPatch, "Geometry", &kFbxPatchInfo, kMeshRows},
+    {"Geometry", SubClass::kLine, "Geometry", &kFbxLineInfo, kLineRows},
 
-    {"Deformer", "Skin", "Deformer", &kFbxSkinInfo, kNoRows},
-    {"Deformer", "Cluster", "SubDeformer", &kFbxClusterInfo, kNoRows},
-    {"Deformer", "BlendShape", "Deformer", &kFbxBlendShapeInfo, kNoRows},
-    {"Deformer", "BlendShapeChannel", "SubDeformer", &kFbxBlendShapeChannelInfo, kNoRows},
-    {"Deformer", "VertexCacheDeformer", "Deformer", &kFbxVertexCacheDeformerInfo, kVertexCacheDeformerRows},
+    {"Deformer", SubClass::kSkin, "Deformer", &kFbxSkinInfo, kNoRows},
+    {"Deformer", SubClass::kCluster, "SubDeformer", &kFbxClusterInfo, kNoRows},
+    {"Deformer", SubClass::kBlendShape, "Deformer", &kFbxBlendShapeInfo, kNoRows},
+    {"Deformer", SubClass::kBlendShapeChannel, "SubDeformer", &kFbxBlendShapeChannelInfo, kNoRows},
+    {"Deformer", SubClass::kVertexCacheDeformer, "Deformer", &kFbxVertexCacheDeformerInfo, kVertexCacheDeformerRows},
     {"Cache", kAny, "Cache", &kFbxCacheInfo, kCacheRows},
 
     {"Material", kAny, "Material", &kFbxSurfaceMaterialInfo, kMaterialRows},
@@ -65,7 +66,7 @@ constinit const SchemaClass kClasses[] = {
     {"Material", kAny, "Material", &kFbxSurfacePhongInfo, kPhongRows},
     {"Texture", kAny, "Texture", &kFbxFileTextureInfo, kFileTextureRows},
     {"LayeredTexture", kAny, "LayeredTexture", &kFbxLayeredTextureInfo, kLayeredTextureRows},
-    {"Video", "Clip", "Video", &kFbxVideoInfo, kVideoRows},
+    {"Video", SubClass::kClip, "Video", &kFbxVideoInfo, kVideoRows},
     {"Video", kAny, "Video", &kFbxVideoInfo, kVideoRows},
 
     {"AnimationStack", kAny, "AnimStack", &kFbxAnimStackInfo, kAnimStackRows},

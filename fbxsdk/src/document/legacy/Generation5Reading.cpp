@@ -10,6 +10,7 @@
 #include "document/legacy/LegacyObjects.h"
 #include "document/legacy/LegacyRecords.h"
 #include "document/legacy/LegacyTakes.h"
+#include "schema/SubClasses.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -97,12 +98,13 @@ private:
                 continue;
             if (skin == 0) {
                 skin = mBuilder.newId();
-                mBuilder.addObject(skin, "Deformer", "Skin", "");
+                mBuilder.addObject(skin, "Deformer", SubClass::kSkin, "");
                 mBuilder.connect(skin, parts->attribute);
             }
             const std::int64_t cluster = mBuilder.newId();
             const std::string_view bone = link.value(0).toText();
-            mBuilder.addObject(cluster, "Deformer", "Cluster", nameWithoutClass(bone, mBuilder.tree().ascii), &link);
+            mBuilder.addObject(cluster, "Deformer", SubClass::kCluster, nameWithoutClass(bone, mBuilder.tree().ascii),
+                               &link);
             mBuilder.connect(cluster, skin);
             mBuilder.connect(mObjects.find(bone), cluster);
         }

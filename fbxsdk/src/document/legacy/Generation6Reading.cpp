@@ -12,6 +12,7 @@
 #include "document/legacy/LegacyTakes.h"
 #include "schema/PropertyFlags.h"
 #include "schema/PropertyTypes.h"
+#include "schema/SubClasses.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -196,10 +197,10 @@ private:
     [[nodiscard]] static bool hasAttribute(const Record& record, std::string_view kind, const SplitProperties& split) {
         if (kind.empty())
             return false;
-        if (kind == "Null")
+        if (kind == SubClass::kNull)
             return split.flagged || record.child("TypeFlags") || record.child("NodeAttributeName");
         // Geometry that is not a mesh has a record of its own in newer files, and a connection.
-        return kind == "Mesh" || attributeRecordOf(kind) != "Geometry" || hasPoints(record);
+        return kind == SubClass::kMesh || attributeRecordOf(kind) != "Geometry" || hasPoints(record);
     }
 
     void addAttribute(const Record& record, std::string_view fullName, std::int64_t model, std::string_view kind,

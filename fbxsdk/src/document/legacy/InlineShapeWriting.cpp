@@ -12,6 +12,7 @@
 
 #include "document/DocumentSections.h"
 #include "document/legacy/InlineShapes.h"
+#include "schema/SubClasses.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -41,7 +42,7 @@ public:
 
     void move() {
         for (DocumentObject& object : mDocument.objects)
-            if (object.record == "Geometry" && object.subClass != "Shape")
+            if (object.record == "Geometry" && object.subClass != SubClass::kShape)
                 moveInto(object);
         if (mRemoved.empty())
             return;
@@ -75,9 +76,9 @@ private:
         std::set<std::string, std::less<>> names;
         for (const DocumentProperty& property : geometry.properties)
             names.emplace(property.name);
-        for (const DocumentObject* blendShape : sourcesOf(geometry.id, "Deformer", "BlendShape")) {
+        for (const DocumentObject* blendShape : sourcesOf(geometry.id, "Deformer", SubClass::kBlendShape)) {
             mRemoved.insert(blendShape->id);
-            for (const DocumentObject* channel : sourcesOf(blendShape->id, "Deformer", "BlendShapeChannel"))
+            for (const DocumentObject* channel : sourcesOf(blendShape->id, "Deformer", SubClass::kBlendShapeChannel))
                 moveChannel(geometry, *channel, names, shapes);
         }
         if (!shapes.empty())
@@ -87,7 +88,7 @@ private:
     void moveChannel(DocumentObject& geometry, const DocumentObject& channel, std::set<std::string, std::less<>>& names,
                      std::vector<ShapeRecord>& shapes) {
         mRemoved.insert(channel.id);
-        const std::vector<DocumentObject*> targets = sourcesOf(channel.id, "Geometry", "Shape");
+        const std::vector<DocumentObject*> targets = sourcesOf(channel.id, "Geometry", SubClass::kShape);
         for (const DocumentObject* target : targets)
             mRemoved.insert(target->id);
         if (targets.empty())

@@ -3,6 +3,7 @@
 //
 // Converts Shape records inside a geometry to a chain of deformers.
 #include "document/legacy/InlineShapes.h"
+#include "schema/SubClasses.h"
 
 #include <map>
 #include <unordered_map>
@@ -57,9 +58,9 @@ InlineShape addChannel(DocumentBuilder& builder, std::int64_t blendShape, const 
     const std::string_view name = nameWithoutClass(shape.value(0).toText(), builder.tree().ascii);
     const std::span<const Value> weight = weights.of(name);
     const std::int64_t channel = builder.newId();
-    setShapeWeight(builder, builder.addObject(channel, "Deformer", "BlendShapeChannel", name), weight);
+    setShapeWeight(builder, builder.addObject(channel, "Deformer", SubClass::kBlendShapeChannel, name), weight);
     const std::int64_t target = builder.newId();
-    builder.addObject(target, "Geometry", "Shape", name, &shape);
+    builder.addObject(target, "Geometry", SubClass::kShape, name, &shape);
     builder.connect(channel, blendShape);
     builder.connect(target, channel);
     return {name, channel};
@@ -134,7 +135,7 @@ std::vector<InlineShape> addInlineShapes(DocumentBuilder& builder, std::size_t g
             continue;
         if (blendShape == 0) {
             blendShape = builder.newId();
-            builder.addObject(blendShape, "Deformer", "BlendShape", "");
+            builder.addObject(blendShape, "Deformer", SubClass::kBlendShape, "");
             builder.connect(blendShape, geometry);
         }
         shapes.push_back(addChannel(builder, blendShape, shape, weights));
@@ -153,7 +154,7 @@ void translateInlineShapes(DocumentBuilder& builder) {
     const std::size_t objectCount = builder.document().objects.size();
     for (std::size_t i = 0; i < objectCount; ++i) {
         const DocumentObject& object = builder.document().objects[i];
-        if (!object.body->child("Shape") || object.record != "Geometry" || object.subClass == "Shape")
+        if (!object.body->child("Shape") || object.record != "Geometry" || object.subClass == SubClass::kShape)
             continue;
         const std::int64_t geometry = object.id;
         for (const InlineShape& shape : addInlineShapes(builder, i))

@@ -3,6 +3,7 @@
 //
 // Tables of the records that become properties.
 #include "document/legacy/LegacyRecords.h"
+#include "schema/SubClasses.h"
 
 #include <algorithm>
 
@@ -175,18 +176,18 @@ std::string_view legacyKindOf(const Record& model) {
     if (row != std::end(kKindsOfFlags))
         return row->second;
     if (flags.empty() && (model.child("Vertices") || model.child("PolygonVertexIndex")))
-        return "Mesh";
+        return SubClass::kMesh;
     return flags;
 }
 
 Properties legacyAttributeProperties(DocumentBuilder& builder, std::string_view kind, const Record& model) {
     Properties properties;
-    if (kind == "Camera") {
+    if (kind == SubClass::kCamera) {
         addRows(builder, kCameraRows, model, properties);
         addProjection(builder, model, properties);
         addFilm(builder, model, properties);
         addFilmFormat(builder, model, properties);
-    } else if (kind == "Light") {
+    } else if (kind == SubClass::kLight) {
         addRows(builder, kLightRows, model, properties);
     } else if (const Record* display = model.child("Properties")) {
         addRows(builder, kDisplayRows, *display, properties);

@@ -3,6 +3,7 @@
 //
 // Which object contains which, from the document's connections.
 #include "document/legacy/LegacyLayout.h"
+#include "schema/SubClasses.h"
 
 #include <algorithm>
 #include <iterator>
@@ -24,7 +25,7 @@ bool isAnimation(const DocumentObject& object) {
 
 /// Curves and surfaces have records of their own; attributes and meshes are inside their Models.
 bool standsInModel(const DocumentObject& object) {
-    return object.record == "NodeAttribute" || (object.record == "Geometry" && object.subClass == "Mesh");
+    return object.record == "NodeAttribute" || (object.record == "Geometry" && object.subClass == SubClass::kMesh);
 }
 
 bool betweenObjects(const DocumentConnection& connection) {

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 #include "document/legacy/LegacyObjects.h"
+#include "schema/SubClasses.h"
 
 #include <algorithm>
 
@@ -9,7 +10,9 @@ namespace detail {
 namespace {
 
 constexpr std::string_view kGeometryKinds[] = {
-    "Mesh", "Nurb", "NurbsSurface", "NurbsCurve", "Patch", "Line", "TrimNurbsSurface", "Boundary", "Shape",
+    SubClass::kMesh,  SubClass::kNurb, SubClass::kNurbsSurface,     SubClass::kNurbsCurve,
+    SubClass::kPatch, SubClass::kLine, SubClass::kTrimNurbsSurface, SubClass::kBoundary,
+    SubClass::kShape,
 };
 
 } // namespace
