@@ -16,10 +16,7 @@ public:
     AsNobody() { mChanged = ::geteuid() == 0 && ::seteuid(kNobody) == 0; }
     AsNobody(const AsNobody&) = delete;
     AsNobody& operator=(const AsNobody&) = delete;
-    ~AsNobody() {
-        if (mChanged)
-            EXPECT_EQ(::seteuid(0), 0);
-    }
+    ~AsNobody() { EXPECT_TRUE(!mChanged || ::seteuid(0) == 0); }
 
 private:
     static constexpr uid_t kNobody = 65534;

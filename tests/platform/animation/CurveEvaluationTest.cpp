@@ -458,8 +458,7 @@ TEST(CurveEvaluation, SurvivesNumbersThatAreNone) {
 
             const CurveKeys broken = curveOf({{0.0, odd, flags}, {1.0, 2.0F, flags}, {2.0, odd, flags}});
             EXPECT_EQ(at(broken, 1.0), 2.0F);
-            if (std::isfinite(odd))
-                EXPECT_TRUE(std::isfinite(at(broken, 1.5))) << flags << ' ' << odd;
+            EXPECT_TRUE(!std::isfinite(odd) || std::isfinite(at(broken, 1.5))) << flags << ' ' << odd;
         }
     }
 }
