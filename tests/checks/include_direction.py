@@ -86,7 +86,8 @@ def violations(root):
 MODULES_FILE = "fbxsdk/CMakeLists.txt"
 MODULE = re.compile(r"tarnell_module\((\w+)(?: NEEDS ([\w ]+?))?(?: LIBRARIES [^)]*)?\)")
 PLATFORM_INCLUDE = re.compile(r'^(?:"(\w+)/[^"]+"|<fbxsdk/([\w/]+)\.h>)$')
-# A class belongs to the module of the source that bears its name; these have none.
+IMPLEMENTED = re.compile(r"^FBXSDK_(?:OBJECT|ABSTRACT)_IMPLEMENT\((\w+),", re.MULTILINE)
+# A class belongs to the module of the source that has its name or implements it; these have none.
 OTHER_HEADERS = {
     "FbxArch": "core", "FbxArray": "core", "FbxColor": "core", "FbxEuler": "core", "FbxTypes": "core",
     "FbxVector2": "core", "FbxVector4": "core", "FbxTransform": "core", "FbxSystemUnit": "scene",
@@ -111,12 +112,16 @@ def module_violations(root):
     module_of_class = dict(OTHER_HEADERS)
     sources = [path for pattern in ("*.h", "*.cpp") for path in sorted((root / "fbxsdk/src").rglob(pattern))]
     for path in sources:
-        if path.suffix == ".cpp" and path.stem.startswith("Fbx"):
-            module_of_class[path.stem] = path.relative_to(root / "fbxsdk/src").parts[0]
+        if path.suffix == ".cpp":
+            module = path.relative_to(root / "fbxsdk/src").parts[0]
+            if path.stem.startswith("Fbx"):
+                module_of_class[path.stem] = module
+            for implemented in IMPLEMENTED.finditer(path.read_text(encoding="utf-8")):
+                module_of_class[implemented[1]] = module
     headers = sorted((root / "fbxsdk/include/fbxsdk").glob("*.h"))
     for path in (headers if usable else []):
         if path.stem not in module_of_class:
-            yield f"{path.relative_to(root)}: no source bears its name: add it to OTHER_HEADERS"
+            yield f"{path.relative_to(root)}: no source has its name or implements its class: add it to OTHER_HEADERS"
     for path in sources + headers:
         module = module_of_class.get(path.stem) if path in headers else path.relative_to(root / "fbxsdk/src").parts[0]
         source = without_comments(path.read_text(encoding="utf-8"))

@@ -76,6 +76,13 @@ class IncludeDirection(unittest.TestCase):
                                                                   '#include "document/Document.h"\n'})
         self.assertEqual(found, [])
 
+    def test_knows_the_module_of_a_class_by_the_source_that_implements_it(self):
+        found = self.check_modules({"fbxsdk/src/scene/Attributes.cpp": "FBXSDK_OBJECT_IMPLEMENT(FbxNew, FbxObject, kRows)\n",
+                                  "fbxsdk/include/fbxsdk/FbxNew.h": "",
+                                  "fbxsdk/src/object/FbxObject.cpp": "#include <fbxsdk/FbxNew.h>\n"})
+        self.assertEqual(len(found), 1, found)
+        self.assertTrue(found[0].startswith("fbxsdk/src/object/FbxObject.cpp:1: <fbxsdk/FbxNew.h>"), found)
+
     def test_refuses_a_public_header_of_no_module(self):
         found = self.check_modules({"fbxsdk/include/fbxsdk/FbxNew.h": ""})
         self.assertEqual(len(found), 1, found)
