@@ -10,9 +10,16 @@
 
 namespace tool {
 
+JsonWriter::~JsonWriter() {
+    try {
+        flush();
+    } catch (const std::ios_base::failure&) { // the document is incomplete because of another error, or of this one
+    }
+}
+
 void JsonWriter::key(std::string_view name) {
     text(name);
-    mOut << (mPretty ? ": " : ":");
+    put(mPretty ? ": " : ":");
     mAfterKey = true;
 }
 
@@ -20,7 +27,11 @@ void JsonWriter::text(std::string_view value) {
     const auto isPlain = [](char c) { return c >= ' ' && c <= '~' && c != '"' && c != '\\'; };
     if (std::all_of(value.begin(), value.end(), isPlain)) {
         separate();
-        mOut << '"' << value << '"';
+        put("\"");
+        put(value);
+        put("\"");
+        if (mLevels.empty())
+            flush();
         return;
     }
     // Names may contain anything; invalid UTF-8 becomes the replacement character.
@@ -60,13 +71,13 @@ void JsonWriter::reals(float value, std::size_t count) {
     for (std::size_t i = 0; i < std::min(left, kTogether); ++i)
         block += next;
     for (; left >= kTogether; left -= kTogether)
-        mOut << block;
-    mOut << std::string_view(block).substr(0, left * next.size());
+        put(block);
+    put(std::string_view(block).substr(0, left * next.size()));
 }
 
 void JsonWriter::open(char bracket) {
     separate();
-    mOut << bracket;
+    put({&bracket, 1});
     mLevels.emplace_back();
 }
 
@@ -75,7 +86,9 @@ void JsonWriter::close(char bracket) {
     mLevels.pop_back();
     if (!wasEmpty)
         breakLine();
-    mOut << bracket;
+    put({&bracket, 1});
+    if (mLevels.empty())
+        flush();
 }
 
 void JsonWriter::separate() {
@@ -84,7 +97,7 @@ void JsonWriter::separate() {
         return;
     }
     if (!mLevels.back().empty)
-        mOut << ',';
+        put(",");
     mLevels.back().empty = false;
     breakLine();
 }
@@ -92,9 +105,14 @@ void JsonWriter::separate() {
 void JsonWriter::breakLine() {
     if (!mPretty)
         return;
-    mOut << '\n';
+    put("\n");
     for (std::size_t i = 0; i < mLevels.size(); ++i)
-        mOut << "  ";
+        put("  ");
+}
+
+void JsonWriter::flush() {
+    mOut.write(mBlock.data(), static_cast<std::streamsize>(mBlock.size()));
+    mBlock.clear();
 }
 
 } // namespace tool

@@ -13,10 +13,14 @@
 
 namespace tool {
 
-/// Writes one JSON document. Calls must nest properly: a value in an object follows a key.
+/// Writes one JSON document. Calls must nest properly: a value in an object follows a key. What was written has reached
+/// the stream when the outermost value ends.
 class JsonWriter {
 public:
     JsonWriter(std::ostream& out, bool pretty) : mOut(out), mPretty(pretty) {}
+    JsonWriter(const JsonWriter&) = delete;
+    JsonWriter& operator=(const JsonWriter&) = delete;
+    ~JsonWriter(); ///< An incomplete document reaches the stream as far as it goes.
 
     void beginObject() { open('{'); }
     void endObject() { close('}'); }
@@ -50,8 +54,18 @@ private:
     void separate();
     void raw(std::string_view characters) {
         separate();
-        mOut << characters;
+        put(characters);
+        if (mLevels.empty())
+            flush();
     }
+    /// To the stream in blocks: an insertion of its own for each number takes longer than formatting it.
+    void put(std::string_view characters) {
+        constexpr std::size_t kBlockSize = std::size_t{1} << 16;
+        mBlock += characters;
+        if (mBlock.size() >= kBlockSize)
+            flush();
+    }
+    void flush();
     template <class Real>
     void finite(Real value) {
         if (std::isfinite(value))
@@ -71,6 +85,7 @@ private:
         bool empty = true;
     };
     std::ostream& mOut;
+    std::string mBlock; ///< that is not in the stream yet
     bool mPretty;
     bool mAfterKey = false;
     std::vector<Level> mLevels;
