@@ -143,6 +143,26 @@ TEST(FaithfulLight, ShinesAlongMinusZWhateverItsType) {
     }
 }
 
+TEST(FaithfulMarkers, HaveTheirLookSizeColourAndPlace) {
+    TestScene scene(0, 1);
+    fbxsdk::FbxNode* node = scene.add<fbxsdk::FbxMarker>("marker");
+    fbxsdk::FbxMarker& marker = *node->GetMarker();
+    marker.Look.Set(fbxsdk::FbxMarker::eSphere);
+    marker.Size.Set(12.0);
+    node->LclTranslation.Set(fbxsdk::FbxDouble3(1, 2, 3));
+    scene.key(marker.Color, "X", {{0, 0.25f}, {1, 0.75f}});
+
+    auto read = readFaithfully<TnFbxMarker>(scene);
+
+    ASSERT_EQ(read.count, 1);
+    EXPECT_EQ(read["marker"].getMarkerLookType(), TnFbxMarker::kFbxMarkerLookSphere);
+    EXPECT_EQ(read["marker"].getMarkerSize(), 12.0f);
+    EXPECT_EQ(read["marker"].getTransformValue(TnFbxTransform::kFbxTransformPositionY), 2.0f);
+    EXPECT_EQ(read["marker"].getValueAt(TnFbxMarker::kFbxMarkerRed, 0.0f), 0.25f);
+    EXPECT_EQ(read["marker"].getValueAt(TnFbxMarker::kFbxMarkerRed, 1.0f), 0.75f);
+    EXPECT_EQ(read["marker"].getValue(TnFbxMarker::kFbxMarkerAlpha), 1.0f) << "files have none";
+}
+
 TEST(FaithfulSizes, AreThoseOfTheFrameAndReportedAsAnimated) {
     TestScene scene(0, 10);
     fbxsdk::FbxNode* node = scene.add<fbxsdk::FbxNull>("null");
