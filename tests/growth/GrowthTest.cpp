@@ -36,19 +36,19 @@ extern "C" {
 // NOLINTBEGIN(bugprone-reserved-identifier): the names are the compiler's and the linker's
 void __sanitizer_cov_trace_pc() { ++gSteps; }
 
-void* __real___asan_memmove(void* to, const void* from, std::size_t size);
-void* __real___asan_memcpy(void* to, const void* from, std::size_t size);
+void* __real_memmove(void* to, const void* from, std::size_t size);
+void* __real_memcpy(void* to, const void* from, std::size_t size);
 void* __real_memchr(const void* bytes, int wanted, std::size_t size);
 int __real_memcmp(const void* a, const void* b, std::size_t size);
 std::size_t __real_strlen(const char* text);
 
-void* __wrap___asan_memmove(void* to, const void* from, std::size_t size) {
+void* __wrap_memmove(void* to, const void* from, std::size_t size) {
     gSteps += size / kBytesPerStep;
-    return __real___asan_memmove(to, from, size);
+    return __real_memmove(to, from, size);
 }
-void* __wrap___asan_memcpy(void* to, const void* from, std::size_t size) {
+void* __wrap_memcpy(void* to, const void* from, std::size_t size) {
     gSteps += size / kBytesPerStep;
-    return __real___asan_memcpy(to, from, size);
+    return __real_memcpy(to, from, size);
 }
 void* __wrap_memchr(const void* bytes, int wanted, std::size_t size) {
     void* const found = __real_memchr(bytes, wanted, size);
@@ -222,6 +222,7 @@ void expectGrowth(const growth::Kind& kind, Works works, int count) {
     costs(1); // what is computed once per process
     const std::vector<Cost> once = costs(count), twice = costs(2 * count), fourTimes = costs(4 * count);
     for (std::size_t i = 0; i < once.size(); ++i) {
+        ASSERT_GT(once[i].steps, static_cast<std::uint64_t>(count)) << once[i].work << ": nothing counts";
         const double first = std::log2(static_cast<double>(twice[i].steps) / static_cast<double>(once[i].steps));
         const double second = std::log2(static_cast<double>(fourTimes[i].steps) / static_cast<double>(twice[i].steps));
         EXPECT_LE(std::max(first, second), kMostExponent)
