@@ -81,6 +81,51 @@ struct OpenBlock {
     std::size_t end = 0; ///< offset behind the block
 };
 
+template <class Number>
+const char* readPlainNumber(Value& value, const char* bytes, std::size_t left, bool swap) {
+    if (left < sizeof(Number))
+        return nullptr;
+    value.code = bytes[-1];
+    if constexpr (std::is_integral_v<Number>) {
+        value.type = Value::Type::integer;
+        value.integer = loadNumber<Number>(bytes, swap);
+    } else {
+        value.type = Value::Type::real;
+        value.real = loadNumber<Number>(bytes, swap);
+    }
+    return bytes + sizeof(Number);
+}
+
+/// Reads a value of a usual type. The end of its bytes; null, with nothing done, for other and faulty ones.
+const char* readPlainValue(Value& value, const char* at, const char* end, bool swap) {
+    if (at == end)
+        return nullptr;
+    const char* const bytes = at + 1;
+    const auto left = static_cast<std::size_t>(end - bytes);
+    switch (*at) {
+    case 'I':
+        return readPlainNumber<std::int32_t>(value, bytes, left, swap);
+    case 'L':
+        return readPlainNumber<std::int64_t>(value, bytes, left, swap);
+    case 'D':
+        return readPlainNumber<double>(value, bytes, left, swap);
+    case 'S': {
+        constexpr std::size_t kSizeBytes = 4;
+        if (left < kSizeBytes)
+            return nullptr;
+        const std::size_t size = loadNumber<std::uint32_t>(bytes, swap);
+        if (size > left - kSizeBytes)
+            return nullptr;
+        value.type = Value::Type::text;
+        value.code = 'S';
+        value.text = {bytes + kSizeBytes, size};
+        return value.text.data() + size;
+    }
+    default:
+        return nullptr;
+    }
+}
+
 class BinaryReader {
 public:
     BinaryReader(std::span<const char> bytes, RecordTree& tree, FbxStatus& status)
@@ -104,6 +149,11 @@ private:
         return {mBytes.data() + offset, size};
     }
 
+    // Apart from what they are called by, which is short without their texts.
+    [[gnu::cold]] bool failForSize(const Head& head, std::size_t start);
+    [[gnu::cold]] bool failForEnd(const Head& head, std::size_t start, std::string_view name, std::size_t valuesEnd);
+    [[gnu::cold]] bool failForCount(const Head& head, std::size_t end);
+
     bool readHeader();
     bool readRecords();
     bool readHead(Head& head);
@@ -114,10 +164,9 @@ private:
     Record& appendRecord(std::string_view name);
 
     bool readValues(Record& record, const Head& head, std::size_t end);
-    bool readScalarList(Record& record, std::size_t count, std::size_t end);
-    bool readPlainValue(Value& value, std::size_t end);
-    template <class Number>
-    bool readPlainNumber(Value& value, const char* bytes, std::size_t left);
+    [[gnu::noinline]] bool readScalarList(Record& record, std::size_t count, std::size_t end);
+    std::size_t readPlainValues(std::span<Value> values, std::size_t end);
+    [[gnu::noinline]] bool readOtherValues(std::span<Value> values, std::size_t end);
     bool readValue(Value& value, std::size_t end);
     bool readValueOf(char code, Value& value, std::size_t end);
     template <class Number>
@@ -213,21 +262,16 @@ Record& BinaryReader::appendRecord(std::string_view name) {
 bool BinaryReader::readRecord(const Head& head, std::size_t start) {
     const std::size_t blockEnd = mOpen.back().end;
     const std::size_t left = blockEnd - mOffset;
-    if (head.nameLength > left || head.valueBytes > left - head.nameLength) {
-        return fail(start, "values of " + std::to_string(head.valueBytes) + " bytes exceed " +
-                               (mOpen.size() > 1 ? "the block that contains the record" : "the file"));
-    }
+    if (head.nameLength > left || head.valueBytes > left - head.nameLength)
+        return failForSize(head, start);
     Record& record = appendRecord(textAt(mOffset, head.nameLength));
     record.location = start;
     mOffset += head.nameLength;
 
     // Some writers omit the end of records without a block: such a record ends with its values.
     const std::size_t valuesEnd = mOffset + static_cast<std::size_t>(head.valueBytes);
-    if (head.end != 0 && (head.end < valuesEnd || head.end > blockEnd)) {
-        return fail(start, "end offset " + std::to_string(head.end) + " of record '" + std::string(record.name) +
-                               "' is outside the range " + std::to_string(valuesEnd) + " to " +
-                               std::to_string(blockEnd));
-    }
+    if (head.end != 0 && (head.end < valuesEnd || head.end > blockEnd))
+        return failForEnd(head, start, record.name, valuesEnd);
     if (!readValues(record, head, valuesEnd))
         return false;
     mOffset = valuesEnd;
@@ -240,78 +284,60 @@ bool BinaryReader::readRecord(const Head& head, std::size_t start) {
     return true;
 }
 
+bool BinaryReader::failForSize(const Head& head, std::size_t start) {
+    return fail(start, "values of " + std::to_string(head.valueBytes) + " bytes exceed " +
+                           (mOpen.size() > 1 ? "the block that contains the record" : "the file"));
+}
+
+bool BinaryReader::failForEnd(const Head& head, std::size_t start, std::string_view name, std::size_t valuesEnd) {
+    return fail(start, "end offset " + std::to_string(head.end) + " of record '" + std::string(name) +
+                           "' is outside the range " + std::to_string(valuesEnd) + " to " +
+                           std::to_string(mOpen.back().end));
+}
+
+bool BinaryReader::failForCount(const Head& head, std::size_t end) {
+    return fail(mOffset, std::to_string(head.valueCount) + " values do not fit into " + std::to_string(end - mOffset) +
+                             " bytes");
+}
+
 bool BinaryReader::readValues(Record& record, const Head& head, std::size_t end) {
     constexpr std::size_t kSmallestValue = 2;
-    if (head.valueCount > (end - mOffset) / kSmallestValue) {
-        return fail(mOffset, std::to_string(head.valueCount) + " values do not fit into " +
-                                 std::to_string(end - mOffset) + " bytes");
-    }
+    if (head.valueCount > (end - mOffset) / kSmallestValue)
+        return failForCount(head, end);
     const auto count = static_cast<std::size_t>(head.valueCount);
-    if (readScalarList(record, count, end))
+    if (count >= kShortestList && readScalarList(record, count, end))
         return true;
     const std::span<Value> values = mTree.newValues(count);
     const bool isSmall = end - mOffset <= kMostReadAlong;
-    if (isSmall)
-        mAhead.need(mOffset, end - mOffset);
-    for (Value& value : values)
-        if (!(isSmall && readPlainValue(value, end)) && !readValue(value, end))
-            return false;
+    const std::size_t plain = isSmall ? readPlainValues(values, end) : 0;
     record.values = values;
-    return true;
+    return plain == count || readOtherValues(values.subspan(plain), end);
 }
 
-/// Reads a value of a usual type, whose bytes were fetched. False, with nothing done, for other and faulty ones.
-bool BinaryReader::readPlainValue(Value& value, std::size_t end) {
-    if (mOffset == end)
-        return false;
-    const char* const bytes = mBytes.data() + mOffset + 1;
-    const std::size_t left = end - mOffset - 1;
-    switch (bytes[-1]) {
-    case 'I':
-        return readPlainNumber<std::int32_t>(value, bytes, left);
-    case 'L':
-        return readPlainNumber<std::int64_t>(value, bytes, left);
-    case 'D':
-        return readPlainNumber<double>(value, bytes, left);
-    case 'S': {
-        constexpr std::size_t kSizeBytes = 4;
-        if (left < kSizeBytes)
-            return false;
-        const std::size_t size = loadNumber<std::uint32_t>(bytes, mSwap);
-        if (size > left - kSizeBytes)
-            return false;
-        value.type = Value::Type::text;
-        value.code = 'S';
-        value.text = {bytes + kSizeBytes, size};
-        mOffset += 1 + kSizeBytes + size;
-        return true;
-    }
-    default:
-        return false;
-    }
+bool BinaryReader::readOtherValues(std::span<Value> values, std::size_t end) {
+    return std::all_of(values.begin(), values.end(), [&](Value& value) { return readValue(value, end); });
 }
 
-template <class Number>
-bool BinaryReader::readPlainNumber(Value& value, const char* bytes, std::size_t left) {
-    if (left < sizeof(Number))
-        return false;
-    value.code = bytes[-1];
-    if constexpr (std::is_integral_v<Number>) {
-        value.type = Value::Type::integer;
-        value.integer = loadNumber<Number>(bytes, mSwap);
-    } else {
-        value.type = Value::Type::real;
-        value.real = loadNumber<Number>(bytes, mSwap);
+/// Reads values of usual types up to the first that is of another one, or faulty. The number of those read.
+std::size_t BinaryReader::readPlainValues(std::span<Value> values, std::size_t end) {
+    mAhead.need(mOffset, end - mOffset);
+    const char* at = mBytes.data() + mOffset;
+    const char* const last = mBytes.data() + end;
+    const bool swap = mSwap;
+    std::size_t count = 0;
+    for (; count < values.size(); ++count) {
+        const char* const next = readPlainValue(values[count], at, last, swap);
+        if (next == nullptr)
+            break;
+        at = next;
     }
-    mOffset += 1 + sizeof(Number);
-    return true;
+    mOffset = static_cast<std::size_t>(at - mBytes.data());
+    return count;
 }
 
 // Before 7.x there are no arrays: a mesh has a scalar per coordinate. If all have the same type, that is an array with
 // a type code before each element.
 bool BinaryReader::readScalarList(Record& record, std::size_t count, std::size_t end) {
-    if (count < kShortestList)
-        return false;
     mAhead.need(mOffset, 1);
     const ElementCode* const code = findCode(kListCodes, mBytes[mOffset]);
     if (code == nullptr)
