@@ -75,11 +75,11 @@ public:
     bool read() { return readVersion() && readRecords(); }
 
 private:
-    bool fail(const char* place, const std::string& what, FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
+    [[gnu::cold]] bool fail(const char* place, const std::string& what, FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
         mStatus.SetCode(code, "%s: line %s: %s", mTree.fileName.c_str(), lineOf(place).c_str(), what.c_str());
         return false;
     }
-    bool failUnexpected(const char* place, const std::string& expected);
+    [[gnu::cold]] bool failUnexpected(const char* place, const std::string& expected);
     bool refuseZeros(std::string_view token);
 
     [[nodiscard]] std::string lineOf(const char* place) const {
@@ -101,6 +101,7 @@ private:
     void noteVersion(const Record& record);
 
     bool readValues(Record& record);
+    [[nodiscard]] bool isListed(const char* token) const;
     bool readNumberList(Record& record);
     bool readValue(const Record& record, const char* end, Value& value);
     bool readBareValue(const char* end, Value& value);
@@ -275,10 +276,16 @@ bool AsciiReader::readValues(Record& record) {
     return true;
 }
 
+/// Whether a comma follows the token: most records without a text have one value.
+bool AsciiReader::isListed(const char* token) const {
+    const char* const next = skipBlanks(tokenEnd(token, mEnd), mEnd);
+    return next != mEnd && *next == ',';
+}
+
 /// Takes the values as one array if they are many and all numbers. Otherwise leaves them to be read singly.
 bool AsciiReader::readNumberList(Record& record) {
     const char* const start = mNext;
-    if (start == mEnd || *start == '"' || *start == '*')
+    if (start == mEnd || *start == '"' || *start == '*' || !isListed(start))
         return false;
     const NumberRun run = scanNumbers(start, mEnd, /*wordsCount*/ false);
     if (run.count < kShortestList)
@@ -311,13 +318,13 @@ bool AsciiReader::readBareValue(const char* end, Value& value) {
     const std::string_view token(start, end);
     if (token.empty())
         return failUnexpected(start, "a value");
-    if (!refuseZeros(token))
-        return false;
     mNext = end;
     if (const std::optional<std::int64_t> integer = parseInteger(token)) {
         value = Value::ofInteger(*integer);
         return true;
     }
+    if (!refuseZeros(token))
+        return false;
     if (const std::optional<double> real = parseReal(token)) {
         value = Value::ofReal(*real);
         return true;

@@ -134,7 +134,7 @@ public:
     bool read() { return readHeader() && readRecords(); }
 
 private:
-    bool fail(std::size_t offset, const std::string& what, FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
+    [[gnu::cold]] bool fail(std::size_t offset, const std::string& what, FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
         mStatus.SetCode(code, "%s: offset %zu: %s", mTree.fileName.c_str(), offset, what.c_str());
         return false;
     }
