@@ -222,8 +222,9 @@ void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, int co
         fillLayout(source, cornerCount, arrays);
     bool normals = false, uvs = isAlike && mesh.getValidUVs();
     if (fbxsdk::FbxLayer* first = source.GetLayer(0)) {
-        normals = fillNormals(source, *first, bake, cornerCount, arrays);
+        // Normals last: where another thread inflates them, they are ready last, too.
         uvs = isAlike ? uvs : fillUVs(source, *first, cornerCount, arrays);
+        normals = fillNormals(source, *first, bake, cornerCount, arrays);
     }
     const bool colours = fillColours(source, arrays);
     // At the end: if a damaged layer leaves the mesh partly filled, nothing is valid.
