@@ -10,6 +10,7 @@
 #include <algorithm>
 #include <cstddef>
 #include <cstring>
+#include <type_traits>
 
 #ifndef TARNELL_FBX_EXTERNAL_FBXSDK
 #include <fbxsdk/extensions/ItemRuns.h>
@@ -33,15 +34,24 @@ inline fbxsdk::FbxVector4 loadItem<fbxsdk::FbxVector4>(const char* bytes) {
     return {numbers[0], numbers[1], numbers[2], 1.0};
 }
 
-/// Reads `count` items that exist. `runAt(index)` returns items around one.
-template <class Value, class RunAt>
-void readRuns(int first, int count, Value* values, const RunAt& runAt) {
+/// The distance of items in files, where vectors have three numbers.
+template <class Value>
+constexpr std::size_t storedBytes() {
+    return std::is_same_v<Value, fbxsdk::FbxVector4> ? 3 * sizeof(double) : sizeof(Value);
+}
+
+/// Calls `use(i, item)` for `count` items that exist, i from 0 on. `runAt(index)` returns items around one.
+template <class Value, class RunAt, class Use>
+void forEachInRuns(int first, int count, const RunAt& runAt, const Use& use) {
     for (int done = 0; done < count;) {
         const fbxsdk::extensions::ItemRun run = runAt(first + done);
         const int end = std::min(count, run.first + run.count - first);
         const char* bytes = run.at(first + done);
+        if (run.itemBytes == storedBytes<Value>()) // for the compiler, which knows that distance
+            for (; done < end; ++done, bytes += storedBytes<Value>())
+                use(done, loadItem<Value>(bytes));
         for (; done < end; ++done, bytes += run.itemBytes)
-            values[done] = loadItem<Value>(bytes);
+            use(done, loadItem<Value>(bytes));
     }
 }
 
@@ -80,14 +90,16 @@ public:
 #endif
     }
 
-    /// Consecutive items, which must exist.
-    void read(int first, int count, Value* values) {
+    /// Calls `use(i, item)` for consecutive items, which must exist, i from 0 on.
+    template <class Use>
+    void forEach(int first, int count, const Use& use) {
 #ifdef TARNELL_FBX_EXTERNAL_FBXSDK
         for (int i = 0; i < count; ++i)
-            values[i] = mArray->GetAt(first + i);
+            use(i, mArray->GetAt(first + i));
 #else
         mRun = {};
-        readRuns(first, count, values, [this](int index) { return fbxsdk::extensions::itemRun(*mArray, index); });
+        forEachInRuns<Value>(
+            first, count, [this](int index) { return fbxsdk::extensions::itemRun(*mArray, index); }, use);
 #endif
     }
 
@@ -98,14 +110,16 @@ private:
 #endif
 };
 
-/// Consecutive control points, which must exist. Throws std::runtime_error when the file has been changed.
-inline void readControlPoints(fbxsdk::FbxGeometryBase& geometry, int first, int count, fbxsdk::FbxVector4* points) {
+/// Calls `use(i, point)` for consecutive control points, which must exist, i from 0 on. Throws std::runtime_error when
+/// the file has been changed.
+template <class Use>
+void forEachControlPoint(fbxsdk::FbxGeometryBase& geometry, int first, int count, const Use& use) {
 #ifdef TARNELL_FBX_EXTERNAL_FBXSDK
     for (int i = 0; i < count; ++i)
-        points[i] = geometry.GetControlPointAt(first + i);
+        use(i, geometry.GetControlPointAt(first + i));
 #else
-    readRuns(first, count, points,
-             [&geometry](int index) { return fbxsdk::extensions::controlPointRun(geometry, index); });
+    forEachInRuns<fbxsdk::FbxVector4>(
+        first, count, [&geometry](int index) { return fbxsdk::extensions::controlPointRun(geometry, index); }, use);
 #endif
 }
 

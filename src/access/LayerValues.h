@@ -57,8 +57,11 @@ public:
 
     /// Whether they have no index and there are at least that many, so that they can be read in order.
     bool areInOrder(int count) const { return !mIndex.hasArray() && mDirect.hasArray() && mDirect.count() >= count; }
-    /// Consecutive values that are in order.
-    void read(int first, int count, Value* values) const { mDirect.read(first, count, values); }
+    /// Calls `use(i, value)` for consecutive values that are in order, i from 0 on.
+    template <class Use>
+    void forEach(int first, int count, const Use& use) const {
+        mDirect.forEach(first, count, use);
+    }
 
     /// False when there is none; the value is unchanged then.
     bool read(int position, Value& value) const {

@@ -24,8 +24,11 @@ public:
 
     /// Whether the first `count` corners have consecutive values.
     bool areInOrder(int count) const { return !mByControlPoint && mValues.areInOrder(count); }
-    /// Those of consecutive corners.
-    void read(int first, int count, Value* values) const { mValues.read(first, count, values); }
+    /// Calls `use(i, value)` for those of consecutive corners, i from 0 on.
+    template <class Use>
+    void forEach(int first, int count, const Use& use) const {
+        mValues.forEach(first, count, use);
+    }
 
     /// False when the corner has none; the value is unchanged then.
     bool read(const Corner& corner, Value& value) const {

@@ -121,34 +121,28 @@ constexpr int kBlockSize = 256;
 template <class Element, class Value, class Convert, class HandOn>
 bool convertCorners(const detail::CornerValues<Value>& stored, const Value& missing, int cornerCount, int polygonCount,
                     MeshArrays& arrays, const Convert& convert, const HandOn& handOn) {
-    std::array<Value, kBlockSize> values;
     std::array<Element, kBlockSize> elements;
-    const auto passOn = [&](int count) {
-        std::transform(values.begin(), values.begin() + count, elements.begin(), convert);
-        handOn(elements.data(), static_cast<std::size_t>(count));
-    };
+    const auto put = [&](int i, const Value& value) { elements[static_cast<std::size_t>(i)] = convert(value); };
     if (stored.areInOrder(cornerCount)) { // the case of most normals
         for (int first = 0; first < cornerCount; first += kBlockSize) {
             const int count = std::min(kBlockSize, cornerCount - first);
-            stored.read(first, count, values.data());
-            passOn(count);
+            stored.forEach(first, count, put);
+            handOn(elements.data(), static_cast<std::size_t>(count));
         }
         return cornerCount > 0;
     }
     bool found = false;
     int count = 0;
     forEachCorner(arrays, polygonCount, [&](const Corner& corner) {
-        Value& value = values[static_cast<std::size_t>(count)];
-        if (stored.read(corner, value))
-            found = true;
-        else
-            value = missing;
+        Value value = missing;
+        found = stored.read(corner, value) || found;
+        put(count, value);
         if (++count == kBlockSize) {
-            passOn(count);
+            handOn(elements.data(), static_cast<std::size_t>(count));
             count = 0;
         }
     });
-    passOn(count);
+    handOn(elements.data(), static_cast<std::size_t>(count));
     return found;
 }
 
@@ -157,12 +151,11 @@ constexpr auto narrow = [](const fbxsdk::FbxVector4& vector) {
 };
 
 /// The normals of a layer; returns whether it has any.
-bool fillNormals(const fbxsdk::FbxMesh& source, fbxsdk::FbxLayer& layer, const fbxsdk::FbxAMatrix* bake,
-                 int cornerCount, MeshArrays& arrays) {
+bool fillNormals(const fbxsdk::FbxMesh& source, const detail::CornerValues<fbxsdk::FbxVector4>& stored,
+                 const fbxsdk::FbxAMatrix* bake, int cornerCount, MeshArrays& arrays) {
     const fbxsdk::FbxVector4 missing(static_cast<double>(TnFbxMesh::kDefaultMeshNX),
                                      static_cast<double>(TnFbxMesh::kDefaultMeshNY),
                                      static_cast<double>(TnFbxMesh::kDefaultMeshNZ));
-    const detail::CornerValues<fbxsdk::FbxVector4> stored = detail::layerNormals(layer);
     const auto handOn = [&arrays](const MeshArrays::Vector* normals, std::size_t count) {
         arrays.addNormals(normals, count);
     };
@@ -222,9 +215,10 @@ void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, int co
         fillLayout(source, cornerCount, arrays);
     bool normals = false, uvs = isAlike && mesh.getValidUVs();
     if (fbxsdk::FbxLayer* first = source.GetLayer(0)) {
-        // Normals last: where another thread inflates them, they are ready last, too.
+        const detail::CornerValues<fbxsdk::FbxVector4> stored = detail::layerNormals(*first); // throws without any
+        // They come last: where another thread inflates them, they are ready last, too.
         uvs = isAlike ? uvs : fillUVs(source, *first, cornerCount, arrays);
-        normals = fillNormals(source, *first, bake, cornerCount, arrays);
+        normals = fillNormals(source, stored, bake, cornerCount, arrays);
     }
     const bool colours = fillColours(source, arrays);
     // At the end: if a damaged layer leaves the mesh partly filled, nothing is valid.
@@ -295,20 +289,16 @@ void FbxSdk::setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::Fb
     }
     // In blocks: points that are still in a file need not all be in memory.
     const int count = source.GetControlPointsCount();
-    std::array<fbxsdk::FbxVector4, kBlockSize> block;
     std::array<MeshArrays::Vector, kBlockSize> points;
+    const auto put = [&](int i, const fbxsdk::FbxVector4& point) {
+        points[static_cast<std::size_t>(i)] = narrow(bake != nullptr ? bake->MultT(point) : point);
+    };
     for (int first = 0; first < count; first += kBlockSize) {
         const int size = std::min(kBlockSize, count - first);
-        if (isDeformed)
-            std::copy_n(&deformed[static_cast<std::size_t>(first)], size, block.begin());
-        else
-            detail::readControlPoints(source, first, size, block.data());
-        if (bake != nullptr) {
-            std::transform(
-                block.begin(), block.begin() + size, block.begin(),
-                [bake](const fbxsdk::FbxVector4& point) { return bake->MultT(point); });
-        }
-        std::transform(block.begin(), block.begin() + size, points.begin(), narrow);
+        if (!isDeformed)
+            detail::forEachControlPoint(source, first, size, put);
+        for (int i = 0; isDeformed && i < size; ++i)
+            put(i, deformed[static_cast<std::size_t>(first + i)]);
         arrays.addControlPoints(points.data(), static_cast<std::size_t>(size));
     }
 }

@@ -75,7 +75,8 @@ public:
     bool read() { return readVersion() && readRecords(); }
 
 private:
-    [[gnu::cold]] bool fail(const char* place, const std::string& what, FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
+    [[gnu::cold]] bool fail(const char* place, const std::string& what,
+                            FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
         mStatus.SetCode(code, "%s: line %s: %s", mTree.fileName.c_str(), lineOf(place).c_str(), what.c_str());
         return false;
     }

@@ -134,7 +134,8 @@ public:
     bool read() { return readHeader() && readRecords(); }
 
 private:
-    [[gnu::cold]] bool fail(std::size_t offset, const std::string& what, FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
+    [[gnu::cold]] bool fail(std::size_t offset, const std::string& what,
+                            FbxStatus::EStatusCode code = FbxStatus::eInvalidFile) {
         mStatus.SetCode(code, "%s: offset %zu: %s", mTree.fileName.c_str(), offset, what.c_str());
         return false;
     }
@@ -315,7 +316,8 @@ bool BinaryReader::readValues(Record& record, const Head& head, std::size_t end)
 }
 
 bool BinaryReader::readOtherValues(std::span<Value> values, std::size_t end) {
-    return std::all_of(values.begin(), values.end(), [&](Value& value) { return readValue(value, end); });
+    return std::all_of(
+        values.begin(), values.end(), [&](Value& value) { return readValue(value, end); });
 }
 
 /// Reads values of usual types up to the first that is of another one, or faulty. The number of those read.
