@@ -70,19 +70,20 @@ bool readMayaCache(fbxsdk::FbxCache& cache, const fbxsdk::FbxString& channelName
     return channel >= 0 && cache.Read(channel, time, buffer.data(), static_cast<unsigned int>(buffer.size() / 3));
 }
 
-/// Linear interpolation between two samples.
+/// Linear interpolation between two frames; those before frame 0 are passed as unsigned numbers, too.
 bool readMaxCache(fbxsdk::FbxCache& cache, double frame, std::vector<double>& buffer) {
-    constexpr double most = std::numeric_limits<int>::max();
-    const double held = std::fmin(std::fmax(frame, 0.0), most);
+    constexpr double most = std::numeric_limits<int>::max() - 1;
+    const double held = std::fmin(std::fmax(frame, -most), most);
     const double whole = std::floor(held + 1e-4);
     const double rest = std::fmax(held - whole, 0.0);
     const auto points = static_cast<unsigned int>(buffer.size() / 3);
-    if (!cache.Read(static_cast<unsigned int>(whole), buffer.data(), points))
+    const auto number = static_cast<unsigned int>(static_cast<int>(whole));
+    if (!cache.Read(number, buffer.data(), points))
         return false;
     if (rest < 1e-4)
         return true;
     std::vector<double> next(buffer.size());
-    if (!cache.Read(static_cast<unsigned int>(whole) + 1, next.data(), points))
+    if (!cache.Read(number + 1, next.data(), points))
         return false;
     for (std::size_t i = 0; i < buffer.size(); ++i)
         buffer[i] += (next[i] - buffer[i]) * rest;
