@@ -131,18 +131,26 @@ bool statesItsBinding(const Cluster& cluster) {
     return !cluster.GetTransformMatrix(bound).IsIdentity() || !cluster.GetTransformLinkMatrix(linkBound).IsIdentity();
 }
 
+/// Where a node was when the skin was bound: as the cluster states it, or in the scene's static pose.
+Matrix boundPlace(const Matrix& stated, fbxsdk::FbxNode& node, const Binding& binding) {
+    return binding.stated ? stated : worldMatrix(node, fbxsdk::FBXSDK_TIME_INFINITE);
+}
+
+/// The place of the mesh's own space when it was bound.
+Matrix boundMesh(const Cluster& cluster, const Binding& binding) {
+    Matrix stated;
+    return boundPlace(cluster.GetTransformMatrix(stated), binding.node, binding) * binding.geometric;
+}
+
 /// From the mesh's own space to where a cluster's link moves it; without a link to its bind pose.
 Matrix motionOf(const Cluster& cluster, const Binding& binding) {
-    Matrix bound, linkBound;
-    cluster.GetTransformMatrix(bound);
-    cluster.GetTransformLinkMatrix(linkBound);
+    const Matrix bound = boundMesh(cluster, binding);
     auto* link = const_cast<fbxsdk::FbxNode*>(cluster.GetLink()); // to be evaluated
-    if (!binding.stated && link != nullptr) {
-        bound = worldMatrix(binding.node, fbxsdk::FBXSDK_TIME_INFINITE);
-        linkBound = worldMatrix(*link, fbxsdk::FBXSDK_TIME_INFINITE);
-    }
-    bound = bound * binding.geometric;
-    return link != nullptr ? worldMatrix(*link, binding.time) * linkBound.Inverse() * bound : bound;
+    if (link == nullptr)
+        return bound;
+    Matrix stated;
+    const Matrix linkBound = boundPlace(cluster.GetTransformLinkMatrix(stated), *link, binding);
+    return worldMatrix(*link, binding.time) * linkBound.Inverse() * bound;
 }
 
 /// In the mesh's own space: how a link moved since it was bound, relative to the mesh or to an associate model.
@@ -151,10 +159,9 @@ Matrix relativeMotionOf(const Cluster& cluster, const Binding& binding) {
     const Matrix motion = motionOf(cluster, binding);
     if (associate == nullptr)
         return binding.place.Inverse() * motion;
-    Matrix bound, associateBound;
-    cluster.GetTransformMatrix(bound);
-    cluster.GetTransformAssociateModelMatrix(associateBound);
-    return (bound * binding.geometric).Inverse() * associateBound * worldMatrix(*associate, binding.time).Inverse() *
+    Matrix stated;
+    const Matrix associateBound = boundPlace(cluster.GetTransformAssociateModelMatrix(stated), *associate, binding);
+    return boundMesh(cluster, binding).Inverse() * associateBound * worldMatrix(*associate, binding.time).Inverse() *
            motion;
 }
 
