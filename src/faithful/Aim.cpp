@@ -28,6 +28,15 @@ std::optional<FbxVector4> direction(const FbxVector4& a) {
     return FbxVector4(a[0] / length, a[1] / length, a[2] / length);
 }
 
+/// The direction on the right of one that looks away from `back`: level where there is an up direction, else as the
+/// camera has it.
+std::optional<FbxVector4> rightOf(const FbxAMatrix& camera, const FbxVector4& up, const FbxVector4& back) {
+    for (const FbxVector4& above : {up, camera.GetRow(1)})
+        if (const std::optional<FbxVector4> right = direction(crossProduct(above, back)))
+            return right;
+    return direction(crossProduct(back, crossProduct(camera.GetRow(0), back)));
+}
+
 } // namespace
 
 FbxAMatrix turnOf(const FbxVector4& angles) {
@@ -40,9 +49,7 @@ FbxAMatrix aimed(const FbxAMatrix& camera, const FbxVector4& point, const FbxVec
     const std::optional<FbxVector4> back = direction(minus(camera.GetT(), point));
     if (!back)
         return camera;
-    std::optional<FbxVector4> right = direction(crossProduct(up, *back));
-    if (!right)
-        right = direction(crossProduct(camera.GetRow(1), *back));
+    const std::optional<FbxVector4> right = rightOf(camera, up, *back);
     if (!right)
         return camera;
     const FbxVector4 axes[3] = {*right, crossProduct(*back, *right), *back};

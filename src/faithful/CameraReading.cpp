@@ -3,6 +3,7 @@
 //
 // Cameras: their direction, lens and film, computed at every frame.
 #include "Aim.h"
+#include "Decomposition.h"
 #include "Lens.h"
 #include "Placement.h"
 #include "Reading.h"
@@ -106,7 +107,12 @@ Placement cameraPlacement(Scene& scene, FbxNode& node, const TnFbxReadInfo& info
         return placement;
     }
     placement.matrixAt = [aim, global, &node](const FbxTime& time) {
-        return global ? aim.matrixAt(time) : parentMatrix(node, time).Inverse() * aim.matrixAt(time);
+        if (global)
+            return aim.matrixAt(time);
+        const FbxAMatrix parent = parentMatrix(node, time);
+        return handedness(parent) == 0.0 // a flattened space does not have the direction to the point
+                   ? localMatrix(node, time) * turnOf(kCameraTurn)
+                   : parent.Inverse() * aim.matrixAt(time);
     };
     FbxNode* target = node.GetTarget();
     FbxNode* above = node.GetTargetUp();

@@ -179,10 +179,12 @@ Vector anglesNear(const Matrix& rotation, RotationOrder order, const Vector& nea
     return distance(b, near) + 1e-9 < distance(a, near) ? b : a;
 }
 
-bool turnAlike(const Matrix& a, const Matrix& b) {
+bool turnsLike(const Matrix& rotation, const Parts& parts) {
     for (int axis = 0; axis < 3; ++axis) {
+        if (parts.scale[static_cast<std::size_t>(axis)] == 0.0)
+            continue;
         for (int component = 0; component < 3; ++component)
-            if (!(std::fabs(a.Get(axis, component) - b.Get(axis, component)) < kSameRotation))
+            if (!(std::fabs(rotation.Get(axis, component) - parts.rotation.Get(axis, component)) < kSameRotation))
                 return false;
     }
     return true;

@@ -33,8 +33,8 @@ fbxsdk::FbxAMatrix rotationOf(const Vector& angles, RotationOrder order);
 /// Of all angles, in degrees, that give the rotation, those nearest to `near`.
 Vector anglesNear(const fbxsdk::FbxAMatrix& rotation, RotationOrder order, const Vector& near);
 
-/// Whether two rotations are equal up to rounding.
-bool turnAlike(const fbxsdk::FbxAMatrix& a, const fbxsdk::FbxAMatrix& b);
+/// Whether a rotation is that of the parts, up to rounding: an axis without scale may be anywhere.
+bool turnsLike(const fbxsdk::FbxAMatrix& rotation, const Parts& parts);
 
 /// The sign of a matrix's determinant: −1 where it mirrors, 0 where it flattens.
 double handedness(const fbxsdk::FbxAMatrix& matrix);

@@ -41,15 +41,16 @@ using fbxsdk::FbxVector4;
 struct Space {
     FbxAMatrix fromMesh;  // for points in the mesh's own space
     FbxAMatrix fromWorld; // for points in the world
+    bool isFlat = false;  // there is no way to it from the world
 };
 
 Space spaceOf(const TnFbxReadInfo& info, FbxNode& node, const FbxTime& time) {
     const FbxAMatrix geometric = geometricMatrix(node);
-    if (!info.getTransformPoints()) // the object's own: its transform applies to them
-        return {geometric, worldMatrix(node, time).Inverse()};
-    if (!info.getGlobalTransform())
-        return {localMatrix(node, time) * geometric, parentMatrix(node, time).Inverse()};
-    return {worldMatrix(node, time) * geometric, FbxAMatrix()};
+    if (info.getTransformPoints() && info.getGlobalTransform())
+        return {worldMatrix(node, time) * geometric, FbxAMatrix()};
+    const bool own = !info.getTransformPoints(); // the object's transform applies to them
+    const FbxAMatrix space = own ? worldMatrix(node, time) : parentMatrix(node, time);
+    return {own ? geometric : localMatrix(node, time) * geometric, space.Inverse(), handedness(space) == 0.0};
 }
 
 /// The transform of a mesh's points to the returned space, and that of its normals.
@@ -77,6 +78,18 @@ private:
     Space mSpace;
     bool mMirrored = false;
 };
+
+/// The points of a node's mesh, now.
+PlacedMesh placedMesh(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, FbxMesh& source) {
+    const FbxTime time = scene.now();
+    const Space space = spaceOf(info, node, time);
+    DeformedMesh deformed = deformedPoints(scene, node, source, time);
+    if (deformed.inWorld && space.isFlat) {
+        detail::warn(scene.fileName() + ": the points that the skin of \"" + node.GetName() +
+                     "\" moves stay in the world: the transform that they are to be relative to has no inverse");
+    }
+    return {std::move(deformed), space};
+}
 
 // ---- Polygons ----
 
@@ -297,8 +310,7 @@ bool readNode(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh&
     const std::uint64_t granted = isKnown ? bytesOfAnother(source, cornerCount) : all;
     if (!scene.grantBytes(granted) || !readNode(scene, info, node, static_cast<TnFbxTransform&>(mesh)))
         return false;
-    const FbxTime time = scene.now();
-    const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
+    const PlacedMesh placed = placedMesh(scene, info, node, source);
     const MeshInstances::Source& kept = placed.mirrored() ? reversed : straight;
     const MeshInstances::Geometry* alike = findAlike(scene, kept, placed.points().size());
     if (alike == nullptr && !scene.grantBytes(all - granted))
@@ -323,8 +335,7 @@ bool addPoints(Scene& scene, const TnFbxReadInfo& info, FbxNode& node, TnFbxMesh
     if (!scene.grantBytes(static_cast<std::uint64_t>(mesh.getNumberOfControlPoints()) * 3 * sizeof(float) *
                           static_cast<std::uint64_t>(sets)))
         return false;
-    const FbxTime time = scene.now();
-    const PlacedMesh placed(deformedPoints(scene, node, source, time), spaceOf(info, node, time));
+    const PlacedMesh placed = placedMesh(scene, info, node, source);
     if (placed.points().size() != static_cast<std::size_t>(mesh.getNumberOfControlPoints())) {
         return detail::fail(scene.fileName() + ": \"" + node.GetName() +
                             "\" has a different number of control points than before");

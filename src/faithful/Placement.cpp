@@ -56,6 +56,13 @@ Parts partsAt(const Placement& placement, const FbxTime& time) {
     return decompose(placement.matrixAt(time), valueAt(placement.node.LclScaling, time));
 }
 
+/// The angles of a rotation. Those of the frame before stay where it has axes without scale, and they turn the others
+/// as it does: what shrinks to nothing does not turn.
+Vector anglesOf(const Parts& parts, RotationOrder order, const Vector& before) {
+    const bool isFlat = parts.scale[0] == 0.0 || parts.scale[1] == 0.0 || parts.scale[2] == 0.0;
+    return isFlat && turnsLike(rotationOf(before, order), parts) ? before : anglesNear(parts.rotation, order, before);
+}
+
 /// The node's own angles, which include full turns, where they give its rotation.
 class OwnAngles {
 public:
@@ -65,8 +72,8 @@ public:
     bool fit() const { return mFit; }
     Vector at(const FbxTime& time) const { return valueAt(mNode.LclRotation, time); }
     /// They are not used once they give another rotation.
-    void compare(const Vector& angles, const Matrix& rotation) {
-        mFit = mFit && turnAlike(rotationOf(angles, mOrder), rotation);
+    void compare(const Vector& angles, const Parts& parts) {
+        mFit = mFit && turnsLike(rotationOf(angles, mOrder), parts);
     }
 
 private:
@@ -84,9 +91,9 @@ void readStill(Scene& scene, const Placement& placement, RotationOrder order, Tn
     const Parts parts = partsAt(placement, scene.now());
     OwnAngles own(placement, order);
     const Vector hint = own.at(scene.now());
-    own.compare(hint, parts.rotation);
+    own.compare(hint, parts);
     const Vector near = placement.nearOwn ? hint : Vector{};
-    setStill(object, valuesOf(parts, own.fit() ? hint : anglesNear(parts.rotation, order, near)));
+    setStill(object, valuesOf(parts, own.fit() ? hint : anglesOf(parts, order, near)));
 }
 
 /// Whether two matrices are equal except for their translation.
@@ -121,10 +128,10 @@ public:
         mAny = true;
         mMatrix = matrix;
         mParts = decompose(matrix, valueAt(mPlacement.node.LclScaling, time));
-        mAngles = anglesNear(mParts.rotation, mOrder, mAngles);
+        mAngles = anglesOf(mParts, mOrder, mAngles);
         if (mOwn.fit()) {
             mOwnAngles = mOwn.at(time);
-            mOwn.compare(mOwnAngles, mParts.rotation);
+            mOwn.compare(mOwnAngles, mParts);
         }
         return valuesOf(mParts, mAngles);
     }
@@ -163,7 +170,7 @@ bool readMoving(Scene& scene, const Placement& placement, RotationOrder order, T
     }
     const bool isOwn = moving.own().fit();
     const Parts now = partsAt(placement, scene.now());
-    setStill(object, valuesOf(now, isOwn ? moving.own().at(scene.now()) : anglesNear(now.rotation, order, nearNow)));
+    setStill(object, valuesOf(now, isOwn ? moving.own().at(scene.now()) : anglesOf(now, order, nearNow)));
     for (std::size_t i = 0; i < kChannels; ++i) {
         detail::SampleRun& run = isOwn && i >= 3 && i < 6 ? ownAngles[i - 3] : samples[i];
         if (!run.isOneValue())

@@ -82,7 +82,7 @@ TEST(Decomposition, TakesAFlatAxisPerpendicularToTheOthers) {
     EXPECT_EQ(parts.scale[1], 0.0);
     EXPECT_NEAR(anglesNear(parts.rotation, TnFbxTransform::kFbxRotationOrderXYZ, {})[2], 90.0, 1e-9);
     const Parts nothing = decompose(fbxsdk::FbxAMatrix() * 0.0, {1.0, 1.0, 1.0});
-    EXPECT_TRUE(turnAlike(nothing.rotation, fbxsdk::FbxAMatrix()));
+    expectSame(nothing.rotation, fbxsdk::FbxAMatrix());
 }
 
 TEST(Angles, TurnLikeTheRotationInEveryOrder) {

@@ -283,9 +283,8 @@ Samples redsOf(FbxLayerElement::EMappingMode mapping, const std::vector<int>& nu
     for (int i = 0; mesh.getValidColours() && i < mesh.getNumberOfPolygonVertices(); ++i) {
         float red = 0.0f, green = 0.0f, blue = 0.0f, alpha = 0.0f;
         EXPECT_TRUE(mesh.getColour(i, red, green, blue, alpha));
-        if (red == 0.25f || red == 0.5f) {
-            EXPECT_EQ(alpha, red == 0.25f ? 1.0f : 0.5f) << "1 − the mean of what is let through";
-        }
+        const float opaque = red == 0.25f ? 1.0f : red == 0.5f ? 0.5f : alpha;
+        EXPECT_EQ(alpha, opaque) << "1 − the mean of what is let through";
         reds.push_back(red);
     }
     return reds;
