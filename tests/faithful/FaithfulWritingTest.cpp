@@ -2,18 +2,14 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // A faithful read returns what was written faithfully: every kind and channel, in every version and encoding.
-#include "FaithfulFixture.h"
+#include "FaithfulFile.h"
 
 #include "FbxFaithful.h"
-
-#include "support/WritingBuilders.h"
 
 #include "TnFbxError.h"
 
 #include <cmath>
 #include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <string>
 #include <tuple>
 #include <vector>
@@ -23,54 +19,8 @@ namespace {
 
 using Transform = TnFbxTransform;
 using Camera = TnFbxCamera;
-using Version = TnFbxWriteInfo::eCompatibilityVersion;
 
 constexpr float kTelevision = 24000.0f / 1001.0f;
-
-/// A file, written faithfully, removed with the object.
-class FaithfulFile {
-public:
-    explicit FaithfulFile(Version version = TnFbxWriteInfo::kFbxVersion2016, bool ascii = false) {
-        info.setFileName(mFolder.file("scene.fbx"));
-        info.setFidelity(kFbxFidelityFaithful);
-        info.setFileFormat(ascii);
-        info.setCompatibilityVersion(version);
-    }
-
-    void write(const WrittenObjects& objects) {
-        EXPECT_TRUE(
-            Fbx().writeFile(info, objects.cameras, objects.lights, objects.transforms, objects.nulls, objects.meshes))
-            << lastError();
-        warnings = lastWarnings();
-    }
-
-    /// Without the transform in the points.
-    TnFbxReadInfo readInfo() const {
-        TnFbxReadInfo read = faithfulRead(info.getFileName());
-        read.setTransformPoints(false);
-        return read;
-    }
-    template <class Object>
-    FacadeRead<Object> read() const {
-        return FacadeRead<Object>(readInfo());
-    }
-    std::string bytes() const {
-        std::ifstream stream(info.getFileName(), std::ios::binary);
-        return {std::istreambuf_iterator<char>(stream), {}};
-    }
-    std::string warningText() const {
-        std::string text;
-        for (const std::string& warning : warnings)
-            text += warning + '\n';
-        return text;
-    }
-
-    TnFbxWriteInfo info;
-    std::vector<std::string> warnings;
-
-private:
-    support::TemporaryFolder mFolder;
-};
 
 void expectSameChannel(const TnFbxChannel& expected, const TnFbxChannel& actual, const std::string& name,
                        float tolerance) {
