@@ -143,6 +143,28 @@ class Findings(unittest.TestCase):
         self.assertEqual(takes(mesh, film, mesh), ["shot", "b1"])
         self.assertEqual(takes(film, mesh, film), ["b0"])
 
+    def test_of_rates_are_of_files_that_state_none(self):
+        def found(text):
+            page = json.loads(run("lint", "--json", "--rules", "rate-unstated", "-", input=text).stdout)
+            return [each["text"] for each in page["findings"]]
+        unstated = dict(time_mode=14, frames=(0, 1), rate=12.5)
+        self.assertEqual(found(scenes.scene(**unstated)),
+                         ["the time mode is custom, without a frame rate; read as 12.5 frames per second"])
+        stated = ('"TimeMode", "enum", "", "",14\n',
+                  '"TimeMode", "enum", "", "",14\n\t\tP: "CustomFrameRate", "double", "Number", "",12.5\n')
+        self.assertEqual(found(scenes.scene(**unstated).replace(*stated)), [])
+        self.assertEqual(found(scenes.scene(**unstated).replace(stated[0], stated[1].replace("12.5", "-1"))),
+                         ["the time mode is custom, without a frame rate; read as 12.5 frames per second"])
+        still = scenes.scene(time_mode=14, keyed=False, span=(0, 0))  # no times to derive a rate from
+        self.assertEqual(found(still), ["the time mode is custom, without a frame rate; read as 30 frames per second"])
+        self.assertEqual(found(scenes.scene(time_mode=0, rate=30)),
+                         ["the time mode is 0, the default of the application; read as 30 frames per second"])
+        self.assertEqual(found(scenes.scene(time_mode=14, taken=False)), [])  # nothing has a time
+        # A warning that quotes a name is not about rates.
+        twice = scenes.scene(names=("cam", "states no frame rate"), connections='C: "OO",20,1\n')
+        self.assertIn("states no frame rate", json.loads(run("lint", "--json", "-", input=twice).stdout)["findings"][0]["text"])
+        self.assertEqual(found(twice), [])
+
     def test_of_scales_see_their_keys(self):
         def found(rule, **keys):
             nulls = scenes.null(30, "big") + scenes.null(31, "free", {"InheritType": 2})

@@ -4,6 +4,9 @@
 // Checks of rates, takes and keys.
 #include <algorithm>
 #include <cmath>
+#include <string>
+
+#include <fbxsdk/extensions/FileFacts.h>
 
 #include "CameraOrigins.h"
 #include "LintChecks.h"
@@ -22,17 +25,12 @@ constexpr double kFrameTolerance = 0.005;
 } // namespace
 
 void rateUnstated(const LintContext& context, LintReport& report) {
-    const FbxGlobalSettings& settings = context.scene().GetGlobalSettings();
-    if (context.stacks.empty())
+    if (context.stacks.empty() || extensions::statesFrameRate(context.scene()))
         return;
-    if (settings.GetTimeMode() == FbxTime::eDefaultMode)
-        report.add("",
-                   "the time mode is 0, the default of the application; read as " + rateText(context.take.frameRate));
-    for (const FbxString& warning : context.file.importer().GetFileHeaderInfo()->mWarnings) {
-        const std::string text = warning.Buffer();
-        if (text.find("states no frame rate") != std::string::npos)
-            report.add("", text);
-    }
+    const bool isCustom = context.file.timeMode() == FbxTime::eCustom;
+    report.add("", std::string(isCustom ? "the time mode is custom, without a frame rate"
+                                        : "the time mode is 0, the default of the application") +
+                       "; read as " + rateText(context.take.frameRate));
 }
 
 void keysBetweenFrames(const LintContext& context, LintReport& report) {

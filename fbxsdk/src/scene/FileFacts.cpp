@@ -3,6 +3,7 @@
 #include <fbxsdk/extensions/FileFacts.h>
 
 #include "object/ObjectData.h"
+#include "scene/SceneData.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace extensions {
@@ -13,6 +14,8 @@ bool isStated(const FbxProperty& property) {
     return property.IsValid() && property.index() >= 0 &&
            property.GetFbxObject()->data().property(property.index()) != nullptr;
 }
+
+bool statesFrameRate(const FbxScene& scene) { return scene.sceneData().fileStatesRate; }
 
 std::vector<FbxObject*> objectsOf(const FbxScene& scene) {
     std::vector<FbxObject*> objects;

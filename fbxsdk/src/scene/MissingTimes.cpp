@@ -118,7 +118,9 @@ void fillStackSpans(const Document& document, const std::vector<FbxObject*>& obj
 
 std::string fillFrameRate(const Document& document, const std::vector<FbxObject*>& objects, FbxScene& scene) {
     FbxGlobalSettings& settings = scene.GetGlobalSettings();
-    if (settings.GetTimeMode() != FbxTime::eCustom || settings.GetCustomFrameRate() > 0.0)
+    const bool lacksRate = settings.GetTimeMode() == FbxTime::eCustom && !(settings.GetCustomFrameRate() > 0.0);
+    scene.sceneData().fileStatesRate = settings.GetTimeMode() != FbxTime::eDefaultMode && !lacksRate;
+    if (!lacksRate)
         return {};
     const FbxAnimStack* first = nullptr;
     eachStack(document, objects, [&](const DocumentObject&, FbxAnimStack& stack) { first = first ? first : &stack; });

@@ -19,7 +19,8 @@ namespace detail {
 void fillStackSpans(const Document& document, const std::vector<FbxObject*>& objects, FbxScene& scene);
 
 /// Sets the rate of a scene with the custom time mode, when the document states none, to one that fits the keys of its
-/// first stack, or else the span of that stack. Returns a warning; empty when there was nothing to do.
+/// first stack, or else the span of that stack. Returns a warning; empty when there was nothing to do. Notes in the
+/// scene whether the document states one.
 [[nodiscard]] std::string fillFrameRate(const Document& document, const std::vector<FbxObject*>& objects,
                                         FbxScene& scene);
 

@@ -29,6 +29,7 @@ struct SceneData final : Membership {
     FbxAnimStack* currentStack = nullptr;
     std::vector<FbxNode*> nodes;       ///< in order of entry
     std::vector<FbxAnimStack*> stacks; ///< likewise
+    bool fileStatesRate = false;       ///< of the file that was read last
     /// How many samples tessellated surfaces have beyond the allowance of their control points.
     std::int64_t samplesUsed = 0;
     /// The files that were read into the scene; geometry is read from them on first use.

@@ -24,6 +24,11 @@ namespace extensions {
 /// animated. Otherwise it has the default of its class. False for an invalid property.
 [[nodiscard]] FBXSDK_DLL bool isStated(const FbxProperty& property);
 
+/// Whether the file that was read into the scene states a frame rate: its time mode is not the application's default,
+/// and a custom one comes with a rate. The rate of another custom one is derived from the times of the file, or
+/// assumed. False for a scene that was made in memory.
+[[nodiscard]] FBXSDK_DLL bool statesFrameRate(const FbxScene& scene);
+
 /// All objects of the scene, in the order of their entry: what GetSrcObject returns one by one, in one pass.
 [[nodiscard]] FBXSDK_DLL std::vector<FbxObject*> objectsOf(const FbxScene& scene);
 
