@@ -43,7 +43,7 @@ inline RateRow exactRate(float framesPerSecond) {
         if (std::fabs(rate - row.rate) < kTolerance * row.rate)
             return row;
     for (const RateRow& row : kWholeRates)
-        if (!(rate < row.rate) && !(rate > row.rate))
+        if (rate >= row.rate && rate <= row.rate)
             return row;
     return {fbxsdk::FbxTime::eCustom, rate};
 }

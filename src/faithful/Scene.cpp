@@ -87,6 +87,7 @@ bool Scene::load(const TnFbxReadInfo& info) {
     const double left = settings.GetSystemUnit().GetScaleFactor(); // a unit that is not a number
     mUnit = left < 1.0 || left > 1.0 || std::isnan(left) ? 1.0 : unit;
     detail::convertToYUp(*mScene);
+    mLoaded = true;
     return select(info);
 }
 

@@ -32,7 +32,7 @@ public:
     /// the former ones stay.
     bool select(const TnFbxReadInfo& info);
 
-    bool isLoaded() const { return mScene != nullptr; }
+    bool isLoaded() const { return mLoaded; }
     fbxsdk::FbxManager* manager() const { return mManager; }
     fbxsdk::FbxScene& scene() const { return *mScene; }
     const std::string& fileName() const { return mFileName; }
@@ -76,6 +76,7 @@ private:
     detail::TimeModeScope mTimeMode;        // an import leaves the file's
     fbxsdk::FbxManager* mManager = nullptr; // owned
     fbxsdk::FbxScene* mScene = nullptr;     // owned by the manager
+    bool mLoaded = false;                   // the scene is that of a file
     std::string mFileName;
     fbxsdk::FbxAnimStack* mStack = nullptr; // null: nothing is animated
     std::vector<fbxsdk::FbxAnimLayer*> mLayers;

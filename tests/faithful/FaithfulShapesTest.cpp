@@ -312,5 +312,25 @@ TEST(FaithfulMaterials, ThatAreNotThereLeaveTheDefaultColour) {
     EXPECT_EQ(redsOf(FbxLayerElement::eByPolygon, {7, -1}), Samples()) << "no corner has one";
 }
 
+/// A square with a material that is no Lambert one.
+TnFbxMesh shaded(bool statesColour) {
+    ShapedScene scene;
+    auto* material = fbxsdk::FbxSurfaceMaterial::Create(scene.scene, "shader");
+    if (statesColour)
+        fbxsdk::FbxProperty::Create(material, fbxsdk::FbxColor3DT, "DiffuseColor")
+            .Set(fbxsdk::FbxDouble3(0.25, 0.5, 0.75));
+    scene.node->AddMaterial(material);
+    return scene.read();
+}
+
+TEST(FaithfulMaterials, OfOtherShadersHaveTheirDiffuseColourWhereTheyStateOne) {
+    const TnFbxMesh mesh = shaded(true);
+    float red = 0.0f, green = 0.0f, blue = 0.0f, alpha = 0.0f;
+    EXPECT_TRUE(mesh.getValidColours());
+    EXPECT_TRUE(mesh.getColour(5, red, green, blue, alpha));
+    EXPECT_THAT((Samples{red, green, blue, alpha}), isNear({0.25f, 0.5f, 0.75f, 1.0f}));
+    EXPECT_FALSE(shaded(false).getValidColours());
+}
+
 } // namespace
 } // namespace Tarnell::Fbx::test
