@@ -338,13 +338,11 @@ TEST(FaithfulCaches, HoldTheNormalsOfCornersBetweenSamples) {
 TEST(FaithfulCaches, ThatAreSwitchedOffMakeWayForTheNextOne) {
     MaxScene scene(maxCache(0.0f, 1.0f, {5.0}));
     scene.deformer->Active.Set(false);
-    FbxCache* cache = scene.deformer->GetCache();
-    auto* second = fbxsdk::FbxVertexCacheDeformer::Create(scene.scene, "second");
-    second->SetCache(cache);
-    second->Active.Set(true);
-    scene.mesh->AddDeformer(second);
+    FbxCache* second = scene.addCache(FbxCache::eMaxPointCacheV2, "").GetCache();
+    second->SetCacheFileName("", scene.folder.write("second.pc2", maxCache(0.0f, 1.0f, {7.0})).c_str());
+    scene.addCache(FbxCache::eMaxPointCacheV2, ""); // that of the first again
     const SavedScene saved(scene);
-    expectHeights(saved.info(), {{0.0, 5.0}});
+    expectHeights(saved.info(), {{0.0, 7.0}});
 }
 
 /// The warning, with the points left to the other deformers, of which there are none.

@@ -358,8 +358,8 @@ TEST(FaithfulDualQuaternions, BlendShiftsLikeMatrices) {
 
 TEST(FaithfulDualQuaternions, GoTheShorterWayRound) {
     DualScene scene;
-    scene.addTurn(1.0, 170.0);
-    scene.addTurn(1.0, -170.0);
+    scene.addTurn(1.0, 100.0);
+    scene.addTurn(1.0, -100.0); // 160 degrees further, through 180
     EXPECT_THAT(scene.moved(), isNear(point(-1.0, 0.0)));
 }
 
