@@ -103,6 +103,17 @@ TEST(FaithfulAim, WithoutAnUpDirectionKeepsTheCamerasOwn) {
     }
 }
 
+TEST(FaithfulAim, OfACameraOfNoSizeAlongTheUpVectorLeavesItsRotation) {
+    AimedScene scene;
+    scene.target->LclTranslation.Set(FbxDouble3(0.0, 10.0, 0.0));
+    scene.node->LclTranslation.Set(FbxDouble3(0.0, 3.0, 0.0));
+    scene.node->LclScaling.Set(FbxDouble3(0.0, 0.0, 0.0));
+    auto read = readFaithfully<TnFbxCamera>(scene);
+    EXPECT_THAT(positionOf(read["camera"]), isNear({0.0f, 3.0f, 0.0f}));
+    EXPECT_THAT(rotationOf(read["camera"]), isNear({0.0f, 0.0f, 0.0f})) << "nothing determines one";
+    EXPECT_THAT(scaleOf(read["camera"]), isNear({0.0f, 0.0f, 0.0f}));
+}
+
 TEST(FaithfulAim, FollowsAnUpNode) {
     AimedScene scene;
     scene.node->LclTranslation.Set(FbxDouble3(5.0, 0.0, 0.0));

@@ -160,6 +160,7 @@ TEST(FaithfulLimits, OfStacksWithoutASpanAreThoseOfTheirKeys) {
     const SavedScene saved(scene);
     FbxFaithful file;
     ASSERT_TRUE(file.load(saved.info())) << lastError();
+    EXPECT_EQ(file.getFrameRate(), 24.0);
     EXPECT_EQ(file.getFirstFrame(), 2);
     EXPECT_EQ(file.getLastFrame(), 6);
 }
