@@ -40,4 +40,15 @@ FacadeRead<Object> readFaithfully(TestScene& scene) {
     return FacadeRead<Object>(SavedScene(scene).info());
 }
 
+/// Three numbers for each corner; empty for a mesh without normals.
+inline Samples normalsOf(const TnFbxMesh& mesh) {
+    Samples normals;
+    for (int i = 0; mesh.getValidNormals() && i < mesh.getNumberOfPolygonVertices(); ++i) {
+        float x = 0.0f, y = 0.0f, z = 0.0f;
+        EXPECT_TRUE(mesh.getNormal(i, x, y, z));
+        normals.insert(normals.end(), {x, y, z});
+    }
+    return normals;
+}
+
 } // namespace Tarnell::Fbx::test

@@ -11,16 +11,6 @@
 namespace Tarnell::Fbx::test {
 namespace {
 
-Samples normalsOf(const TnFbxMesh& mesh) {
-    Samples normals;
-    for (int i = 0; mesh.getValidNormals() && i < mesh.getNumberOfPolygonVertices(); ++i) {
-        float x = 0.0f, y = 0.0f, z = 0.0f;
-        EXPECT_TRUE(mesh.getNormal(i, x, y, z));
-        normals.insert(normals.end(), {x, y, z});
-    }
-    return normals;
-}
-
 Samples firstColourOf(const TnFbxMesh& mesh) {
     float red = 0.0f, green = 0.0f, blue = 0.0f, alpha = 0.0f;
     EXPECT_TRUE(mesh.getValidColours());

@@ -186,18 +186,6 @@ TEST(FaithfulShapes, ComeBeforeTheSkin) {
 
 // ---- Normals ----
 
-/// Three numbers for each corner.
-Samples normalsOf(const TnFbxMesh& mesh) {
-    Samples normals;
-    EXPECT_TRUE(mesh.getValidNormals());
-    for (int i = 0; i < mesh.getNumberOfPolygonVertices(); ++i) {
-        float x = 0.0f, y = 0.0f, z = 0.0f;
-        EXPECT_TRUE(mesh.getNormal(i, x, y, z));
-        normals.insert(normals.end(), {x, y, z});
-    }
-    return normals;
-}
-
 Samples joined(const std::vector<FbxVector4>& normals) {
     Samples numbers;
     for (const FbxVector4& normal : normals) {
