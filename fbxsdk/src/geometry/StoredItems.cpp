@@ -17,6 +17,10 @@ int windowSize(int count, std::size_t itemBytes) {
     return std::min(count / 8 + 2, static_cast<int>(kMostBytes / itemBytes));
 }
 
+/// Up to this size, an array is released when its last item is read: every release interrupts the other threads.
+constexpr std::size_t kReleasedAtOnce = std::size_t{1} << 20;
+static_assert(kReleasedAtOnce <= kLargePage); // a release includes what lies that far before the window
+
 } // namespace
 
 StoredWindow::~StoredWindow() {
@@ -41,7 +45,8 @@ void StoredWindow::moveWindow(int index) {
     int start = 0;
     if (index >= end && index - end < size / 2) {
         start = std::max(mWindowStart, index - size / 2);
-        releaseUpTo(start);
+        if (index == mCount - 1 || mBytes->bytes().size() > kReleasedAtOnce)
+            releaseUpTo(start);
     } else {
         mBytes->restore();
     }
