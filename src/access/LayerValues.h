@@ -63,6 +63,19 @@ public:
         mDirect.forEach(first, count, use);
     }
 
+    /// Whether they have at least that many indices.
+    bool areIndexed(int count) const { return mDirect.hasArray() && mIndex.hasArray() && mIndex.count() >= count; }
+    /// Calls `use(i, value)` for consecutive values that are indexed, i from 0 on; with null where there is none.
+    template <class Use>
+    void forEachIndexed(int first, int count, const Use& use) const {
+        mIndex.forEach(
+            first, count,
+            [&](int i, int index) {
+                Value value;
+                use(i, mDirect.read(index, value) ? &value : nullptr);
+            });
+    }
+
     /// False when there is none; the value is unchanged then.
     bool read(int position, Value& value) const {
         return (!mIndex.hasArray() || mIndex.read(position, position)) && mDirect.read(position, value);

@@ -30,6 +30,14 @@ public:
         mValues.forEach(first, count, use);
     }
 
+    /// Whether the first `count` corners have consecutive indices of values.
+    bool areIndexed(int count) const { return !mByControlPoint && mValues.areIndexed(count); }
+    /// Calls `use(i, value)` for the values of consecutive corners, i from 0 on; with null where there is none.
+    template <class Use>
+    void forEachIndexed(int first, int count, const Use& use) const {
+        mValues.forEachIndexed(first, count, use);
+    }
+
     /// False when the corner has none; the value is unchanged then.
     bool read(const Corner& corner, Value& value) const {
         return mValues.read(mByControlPoint ? corner.controlPoint : corner.polygonVertex, value);

@@ -119,8 +119,9 @@ constexpr int kBlockSize = 256;
 /// Passes on what `convert` makes of each corner's value, or of `missing`, in blocks; returns whether any corner has a
 /// value.
 template <class Element, class Value, class Convert, class HandOn>
-bool convertCorners(const detail::CornerValues<Value>& stored, const Value& missing, int cornerCount, int polygonCount,
-                    MeshArrays& arrays, const Convert& convert, const HandOn& handOn) {
+[[gnu::noinline]] bool convertCorners(const detail::CornerValues<Value>& stored, const Value& missing, int cornerCount,
+                                      int polygonCount, MeshArrays& arrays, const Convert& convert,
+                                      const HandOn& handOn) {
     std::array<Element, kBlockSize> elements;
     const auto put = [&](int i, const Value& value) { elements[static_cast<std::size_t>(i)] = convert(value); };
     if (stored.areInOrder(cornerCount)) { // the case of most normals
@@ -132,6 +133,17 @@ bool convertCorners(const detail::CornerValues<Value>& stored, const Value& miss
         return cornerCount > 0;
     }
     bool found = false;
+    if (stored.areIndexed(cornerCount)) { // of most texture coordinates
+        for (int first = 0; first < cornerCount; first += kBlockSize) {
+            const int count = std::min(kBlockSize, cornerCount - first);
+            stored.forEachIndexed(first, count, [&](int i, const Value* value) {
+                found = found || value != nullptr;
+                put(i, value != nullptr ? *value : missing);
+            });
+            handOn(elements.data(), static_cast<std::size_t>(count));
+        }
+        return found;
+    }
     int count = 0;
     forEachCorner(arrays, polygonCount, [&](const Corner& corner) {
         Value value = missing;
