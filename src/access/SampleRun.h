@@ -6,9 +6,10 @@
 
 #include "TnFbxChannel.h"
 #include "TnFbxTime.h"
-#include "model/SameBits.h"
 
+#include <bit>
 #include <cstddef>
+#include <cstdint>
 #include <utility>
 #include <vector>
 
@@ -24,29 +25,24 @@ public:
         mTotal = total;
     }
 
-    /// Whether adding the value ends the single-sample form: from then on each takes memory.
-    bool spreadsWith(float value) const { return mValues.empty() && mCount > 0 && !haveSameBits(value, mFirst); }
-
-    void add(float value) {
-        if (mCount == 0) {
-            mFirst = value;
-        } else if (!mValues.empty()) {
-            mValues.push_back(value);
-        } else if (spreadsWith(value)) {
-            mValues.reserve(mTotal);
-            mValues.assign(mCount, mFirst);
-            mValues.push_back(value);
-        }
-        ++mCount;
+    /// Whether adding the values, at least one, ends the single-sample form: from then on each takes memory.
+    bool spreadsWith(const float* values, std::size_t count) const {
+        return mValues.empty() && !areAll(mCount > 0 ? mFirst : values[0], values, count);
     }
 
-    /// As many values.
+    void add(float value) { add(&value, 1); }
+    /// As many values, at least one.
     void add(const float* values, std::size_t count) {
-        std::size_t done = 0;
-        while (done < count && mValues.empty())
-            add(values[done++]);
-        mValues.insert(mValues.end(), values + done, values + count);
-        mCount += count - done;
+        const bool spreads = spreadsWith(values, count);
+        if (mCount == 0)
+            mFirst = values[0];
+        if (spreads) {
+            mValues.reserve(mTotal);
+            mValues.assign(mCount, mFirst);
+        }
+        if (spreads || !mValues.empty())
+            mValues.insert(mValues.end(), values, values + count);
+        mCount += count;
     }
 
     /// The value at all frames.
@@ -81,6 +77,15 @@ public:
     std::vector<float> takeAll() { return mValues.empty() ? std::vector<float>(mCount, mFirst) : std::move(mValues); }
 
 private:
+    /// To the bit, as haveSameBits. Without leaving the loop early: so the values are compared several at a time.
+    static bool areAll(float value, const float* values, std::size_t count) {
+        const auto bits = std::bit_cast<std::uint32_t>(value);
+        std::uint32_t different = 0;
+        for (std::size_t i = 0; i < count; ++i)
+            different |= bits ^ std::bit_cast<std::uint32_t>(values[i]);
+        return different == 0;
+    }
+
     std::vector<float> mValues; // empty while all are equal to the first
     float mFirst = 0.0f;
     std::size_t mCount = 0;

@@ -9,7 +9,10 @@
 #include "Reading.h"
 #include "Sampling.h"
 
+#include <algorithm>
 #include <array>
+#include <span>
+#include <utility>
 
 namespace Tarnell::Fbx::faithful {
 
@@ -101,18 +104,18 @@ Placement cameraPlacement(Scene& scene, FbxNode& node, const TnFbxReadInfo& info
     placement.ownAngles = !looksAt; // they are the angles of cameras that the library writes
     placement.nearOwn = false;
     if (!looksAt) {
-        placement.matrixAt = [place = placement.matrixAt, turn = turnOf(kCameraTurn)](const FbxTime& time) {
-            return place(time) * turn;
-        };
+        placement.matricesAt = rotatedFirst(std::move(placement.matricesAt), turnOf(kCameraTurn));
         return placement;
     }
-    placement.matrixAt = [aim, global, &node](const FbxTime& time) {
-        if (global)
-            return aim.matrixAt(time);
-        const FbxAMatrix parent = parentMatrix(node, time);
-        return handedness(parent) == 0.0 // a flattened space does not have the direction to the point
-                   ? localMatrix(node, time) * turnOf(kCameraTurn)
-                   : parent.Inverse() * aim.matrixAt(time);
+    placement.matricesAt = [aim, global, &node](std::span<const FbxTime> times, FbxAMatrix* matrices) {
+        std::transform(times.begin(), times.end(), matrices, [&](const FbxTime& time) {
+            if (global)
+                return aim.matrixAt(time);
+            const FbxAMatrix parent = parentMatrix(node, time);
+            return handedness(parent) == 0.0 // a flattened space does not have the direction to the point
+                       ? localMatrix(node, time) * turnOf(kCameraTurn)
+                       : parent.Inverse() * aim.matrixAt(time);
+        });
     };
     FbxNode* target = node.GetTarget();
     FbxNode* above = node.GetTargetUp();

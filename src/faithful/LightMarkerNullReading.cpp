@@ -12,6 +12,7 @@
 
 #include <array>
 #include <string>
+#include <utility>
 
 namespace Tarnell::Fbx::faithful {
 
@@ -22,9 +23,7 @@ using fbxsdk::FbxTime;
 
 Placement lightPlacement(Scene& scene, FbxNode& node, bool global) {
     Placement placement = placementOf(scene, node, global);
-    placement.matrixAt = [place = placement.matrixAt, turn = turnOf(kLightTurn)](const FbxTime& time) {
-        return place(time) * turn;
-    };
+    placement.matricesAt = rotatedFirst(std::move(placement.matricesAt), turnOf(kLightTurn));
     placement.nearOwn = false; // used only where they give the rotation in the axes of hosts
     return placement;
 }

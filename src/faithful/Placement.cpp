@@ -3,9 +3,14 @@
 #include "Placement.h"
 
 #include "Sampling.h"
+#include "access/NodeGeometry.h"
 #include "access/RotationOrders.h"
 
 #include <array>
+#include <cstdint>
+#include <span>
+#include <utility>
+#include <vector>
 
 namespace Tarnell::Fbx::faithful {
 
@@ -24,9 +29,10 @@ RotationOrder orderInForce(const FbxNode& node) {
     return detail::rotationOrderOf(order);
 }
 
+Vector asVector(const fbxsdk::FbxDouble3& value) { return {value[0], value[1], value[2]}; }
+
 Vector valueAt(fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property, const FbxTime& time) {
-    const fbxsdk::FbxDouble3 value = property.EvaluateValue(time);
-    return {value[0], value[1], value[2]};
+    return asVector(property.EvaluateValue(time));
 }
 
 constexpr std::size_t kChannels = 12;
@@ -53,7 +59,9 @@ Values valuesOf(const Parts& parts, const Vector& angles) {
 }
 
 Parts partsAt(const Placement& placement, const FbxTime& time) {
-    return decompose(placement.matrixAt(time), valueAt(placement.node.LclScaling, time));
+    Matrix matrix;
+    placement.matricesAt({&time, 1}, &matrix);
+    return decompose(matrix, valueAt(placement.node.LclScaling, time));
 }
 
 /// The angles of a rotation. Those of the frame before stay where it has axes without scale, and they turn the others
@@ -106,6 +114,18 @@ bool standAlike(const Matrix& a, const Matrix& b) {
     return true;
 }
 
+/// What the placement of a node at some times is computed from.
+struct Portion {
+    Portion(const Placement& placement, std::span<const FbxTime> times) {
+        placement.matricesAt(times, matrices.data());
+        detail::vectorsAt(placement.node.LclRotation, times, angles.data());
+        detail::vectorsAt(placement.node.LclScaling, times, scales.data());
+    }
+
+    std::array<Matrix, detail::kMostTogether> matrices;
+    std::array<fbxsdk::FbxDouble3, detail::kMostTogether> angles, scales; // the node's own
+};
+
 /// The placement at one frame after the other. A rotation and scale that do not change are decomposed once.
 class MovingPlacement {
 public:
@@ -118,8 +138,9 @@ public:
         mAngles = mPlacement.nearOwn ? mOwnAngles : Vector{};
     }
 
-    Values at(const FbxTime& time) {
-        const Matrix matrix = mPlacement.matrixAt(time);
+    /// At a place in the portion, one after the other.
+    Values at(const Portion& portion, std::size_t place) {
+        const Matrix& matrix = portion.matrices[place];
         if (mAny && !mOwnChanges && standAlike(matrix, mMatrix)) {
             for (int i = 0; i < 3; ++i)
                 mParts.position[static_cast<std::size_t>(i)] = matrix.Get(3, i);
@@ -127,10 +148,10 @@ public:
         }
         mAny = true;
         mMatrix = matrix;
-        mParts = decompose(matrix, valueAt(mPlacement.node.LclScaling, time));
+        mParts = decompose(matrix, asVector(portion.scales[place]));
         mAngles = anglesOf(mParts, mOrder, mAngles);
         if (mOwn.fit()) {
-            mOwnAngles = mOwn.at(time);
+            mOwnAngles = asVector(portion.angles[place]);
             mOwn.compare(mOwnAngles, mParts);
         }
         return valuesOf(mParts, mAngles);
@@ -160,14 +181,21 @@ bool readMoving(Scene& scene, const Placement& placement, RotationOrder order, T
     MovingPlacement moving(scene, placement, order);
     moving.begin(timeline.at(static_cast<double>(timeline.first())));
     Vector nearNow = moving.angles();
-    for (std::int64_t frame = timeline.first(); frame <= timeline.last(); ++frame) {
-        if (!samples.add(moving.at(timeline.at(static_cast<double>(frame)))))
-            return false;
-        if (static_cast<double>(frame) <= static_cast<double>(scene.frame()))
-            nearNow = moving.angles();
-        if (moving.own().fit() && !ownAngles.add(moving.ownAngles()))
-            return false;
-    }
+    const auto addPortion = [&](std::int64_t frame, std::span<const FbxTime> times) {
+        const Portion portion(placement, times);
+        Columns<kChannels> columns;
+        Columns<3> ownColumns;
+        for (std::size_t i = 0; i < times.size(); ++i) {
+            columns.add(moving.at(portion, i));
+            if (static_cast<double>(frame++) <= static_cast<double>(scene.frame()))
+                nearNow = moving.angles();
+            if (moving.own().fit())
+                ownColumns.add(moving.ownAngles());
+        }
+        return samples.add(columns) && ownAngles.add(ownColumns);
+    };
+    if (!scene.inPortions(addPortion))
+        return false;
     const bool isOwn = moving.own().fit();
     const Parts now = partsAt(placement, scene.now());
     setStill(object, valuesOf(now, isOwn ? moving.own().at(scene.now()) : anglesOf(now, order, nearNow)));
@@ -179,11 +207,22 @@ bool readMoving(Scene& scene, const Placement& placement, RotationOrder order, T
     return true;
 }
 
+/// Relative to the parent.
+void localMatrices(FbxNode& node, std::span<const FbxTime> times, Matrix* matrices) {
+    std::vector<Matrix> parents(times.size());
+    if (FbxNode* parent = node.GetParent())
+        detail::globalTransforms(*parent, times, parents.data());
+    detail::globalTransforms(node, times, matrices);
+    for (std::size_t i = 0; i < times.size(); ++i)
+        if (handedness(parents[i]) == 0.0) // a flattened space has no inverse
+            matrices[i] = node.EvaluateLocalTransform(times[i], kSource, /*pApplyTarget*/ false, /*pForceEval*/ false);
+        else
+            matrices[i] = parents[i].Inverse() * matrices[i];
+}
+
 } // namespace
 
-Matrix worldMatrix(FbxNode& node, const FbxTime& time) {
-    return node.EvaluateGlobalTransform(time, kSource, /*pApplyTarget*/ false, /*pForceEval*/ false);
-}
+Matrix worldMatrix(FbxNode& node, const FbxTime& time) { return detail::globalTransform(node, time); }
 
 Matrix parentMatrix(FbxNode& node, const FbxTime& time) {
     FbxNode* parent = node.GetParent();
@@ -191,23 +230,27 @@ Matrix parentMatrix(FbxNode& node, const FbxTime& time) {
 }
 
 Matrix localMatrix(FbxNode& node, const FbxTime& time) {
-    const Matrix parent = parentMatrix(node, time);
-    if (handedness(parent) == 0.0) // a flattened space has no inverse
-        return node.EvaluateLocalTransform(time, kSource, /*pApplyTarget*/ false, /*pForceEval*/ false);
-    return parent.Inverse() * worldMatrix(node, time);
-}
-
-Matrix geometricMatrix(const FbxNode& node) {
     Matrix matrix;
-    matrix.SetTRS(node.GetGeometricTranslation(kSource), node.GetGeometricRotation(kSource),
-                  node.GetGeometricScaling(kSource));
+    localMatrices(node, {&time, 1}, &matrix);
     return matrix;
 }
 
+Matrix geometricMatrix(const FbxNode& node) { return detail::geometricTransform(node); }
+
 Placement placementOf(Scene& scene, FbxNode& node, bool global) {
-    const auto matrixAt = global ? worldMatrix : localMatrix;
-    return {node, [&node, matrixAt](const FbxTime& time) { return matrixAt(node, time); }, scene.moves(node), true,
-            true};
+    const auto matricesAt = global ? detail::globalTransforms : localMatrices;
+    return {
+        node,
+        [&node, matricesAt](std::span<const FbxTime> times, Matrix* matrices) { matricesAt(node, times, matrices); },
+        scene.moves(node), true, true};
+}
+
+MatricesAt rotatedFirst(MatricesAt matricesAt, const Matrix& turn) {
+    return [place = std::move(matricesAt), turn](std::span<const FbxTime> times, Matrix* matrices) {
+        place(times, matrices);
+        for (std::size_t i = 0; i < times.size(); ++i)
+            matrices[i] = matrices[i] * turn;
+    };
 }
 
 bool readPlacement(Scene& scene, const Placement& placement, TnFbxTransform& object) {

@@ -12,6 +12,7 @@
 #include <fbxsdk.h>
 
 #include <functional>
+#include <span>
 
 namespace Tarnell::Fbx::faithful {
 
@@ -27,10 +28,13 @@ fbxsdk::FbxAMatrix localMatrix(fbxsdk::FbxNode& node, const fbxsdk::FbxTime& tim
 /// The offset between the node and its geometry.
 fbxsdk::FbxAMatrix geometricMatrix(const fbxsdk::FbxNode& node);
 
+/// One matrix for each time.
+using MatricesAt = std::function<void(std::span<const fbxsdk::FbxTime> times, fbxsdk::FbxAMatrix* matrices)>;
+
 /// The matrix to decompose, and hints for choosing among equivalent decompositions.
 struct Placement {
     fbxsdk::FbxNode& node;
-    std::function<fbxsdk::FbxAMatrix(const fbxsdk::FbxTime&)> matrixAt;
+    MatricesAt matricesAt;
     bool moves;
     bool ownAngles; ///< the node's own angles are tried first
     bool nearOwn;   ///< others are chosen close to them
@@ -38,6 +42,9 @@ struct Placement {
 
 /// The placement of a node: in the world, or relative to its parent.
 Placement placementOf(Scene& scene, fbxsdk::FbxNode& node, bool global);
+
+/// The same matrices, and before them a rotation.
+MatricesAt rotatedFirst(MatricesAt matricesAt, const fbxsdk::FbxAMatrix& turn);
 
 /// Fills position, rotation, scale and skew, and sets the order: that of the node, where it is used. Angles are
 /// continuous from frame to frame. False, with the reason noted, when there is not enough memory for the samples.

@@ -7,17 +7,38 @@
 #include "Scene.h"
 
 #include "TnFbxTransform.h"
+#include "access/FrameTimes.h"
 #include "access/SampleRun.h"
+#include "access/ToFloat.h"
 
 #include <array>
 #include <cstddef>
+#include <cstdint>
+#include <span>
 
 namespace Tarnell::Fbx::faithful {
 
 using TransformChannel = TnFbxTransform::EFbxTransformChannelType;
 
-/// Rounds to the nearest float; a value out of range becomes infinite, as in IEEE 754.
-inline float toFloat(double value) { return static_cast<float>(value); }
+using detail::toFloat;
+
+/// The values of some channels at some frames.
+template <std::size_t kCount>
+class Columns {
+public:
+    template <class Values>
+    void add(const Values& values) {
+        for (std::size_t i = 0; i < kCount; ++i)
+            mValues[i][mSize] = toFloat(values[i]) + 0.0f; // zero and minus zero are equal
+        ++mSize;
+    }
+    const float* operator[](std::size_t i) const { return mValues[i].data(); }
+    std::size_t size() const { return mSize; }
+
+private:
+    std::array<std::array<float, detail::kMostTogether>, kCount> mValues;
+    std::size_t mSize = 0; // at most kMostTogether
+};
 
 inline void setStatic(TnFbxTransform& object, TransformChannel channel, float value) {
     object.setTransformValue(channel, value);
@@ -37,13 +58,11 @@ public:
     }
 
     /// False, with the reason noted, when there is not enough memory.
-    template <class Values>
-    bool add(const Values& values) {
-        for (std::size_t i = 0; i < kCount; ++i) {
-            const float value = toFloat(values[i]) + 0.0f; // zero and minus zero are equal
-            if (mRuns[i].spreadsWith(value) && !mScene.grantSamples(1))
+    bool add(const Columns<kCount>& columns) {
+        for (std::size_t i = 0; i < kCount && columns.size() > 0; ++i) {
+            if (mRuns[i].spreadsWith(columns[i], columns.size()) && !mScene.grantSamples(1))
                 return false;
-            mRuns[i].add(value);
+            mRuns[i].add(columns[i], columns.size());
         }
         return true;
     }
@@ -69,14 +88,18 @@ bool fillChannels(Scene& scene, bool animated, Object& object, Channel firstChan
         return true;
     if (!scene.grantSamples(0))
         return false;
-    const Timeline& timeline = scene.timeline();
     Runs<kCount> samples(scene);
-    for (std::int64_t frame = timeline.first(); frame <= timeline.last(); ++frame)
-        if (!samples.add(valuesAt(timeline.at(static_cast<double>(frame)))))
-            return false;
+    const auto addPortion = [&](std::int64_t /*frame*/, std::span<const fbxsdk::FbxTime> times) {
+        Columns<kCount> columns;
+        for (const fbxsdk::FbxTime& time : times)
+            columns.add(valuesAt(time));
+        return samples.add(columns);
+    };
+    if (!scene.inPortions(addPortion))
+        return false;
     for (std::size_t i = 0; i < kCount; ++i)
         if (!samples[i].isOneValue()) // samples that are all equal are no animation
-            object.moveValuesAt(channelAt(i), timeline.record(scene.frame()), samples[i].takeAll());
+            object.moveValuesAt(channelAt(i), scene.timeline().record(scene.frame()), samples[i].takeAll());
     return true;
 }
 

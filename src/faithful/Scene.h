@@ -4,6 +4,7 @@
 
 #include "Timeline.h"
 #include "TnFbxReadInfo.h"
+#include "access/FrameTimes.h"
 #include "access/ObjectWarnings.h"
 #include "access/TimeModeScope.h"
 #include "calls/MemoryLimit.h"
@@ -37,6 +38,13 @@ public:
     fbxsdk::FbxScene& scene() const { return *mScene; }
     const std::string& fileName() const { return mFileName; }
     const Timeline& timeline() const { return mTimeline; }
+    /// Calls `use(frame, times)` for all frames, some at a time: the first of these, and the times of all of them.
+    /// False as soon as a call returns that.
+    template <class Use>
+    bool inPortions(Use&& use) {
+        mFrameTimes.begin(mTimeline.first(), mTimeline.rate());
+        return mFrameTimes.inPortions(mTimeline.count(), use);
+    }
     /// Of the file, in centimetres, the unit of the scene.
     double unit() const { return mUnit; }
     /// Frames per second of the file, exactly.
@@ -81,6 +89,7 @@ private:
     fbxsdk::FbxAnimStack* mStack = nullptr; // null: nothing is animated
     std::vector<fbxsdk::FbxAnimLayer*> mLayers;
     Timeline mTimeline;
+    detail::FrameTimes mFrameTimes;
     double mUnit = 1.0;
     double mFileRate = 24.0;
     float mFrame = 0.0f;

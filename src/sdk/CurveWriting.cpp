@@ -48,19 +48,14 @@ void addLinearKeys(fbxsdk::FbxAnimCurve& curve, std::span<const fbxsdk::FbxTime>
 void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float scale, detail::FrameTimes& frameTimes) {
     const TnFbxTime range = channel.getTime();
     const std::int64_t count = detail::frameCount(range.getStartFrame(), range.getEndFrame());
-    frameTimes.begin(range.getStartFrame(), range.getFrameRate());
-    constexpr std::int64_t kBlockSize = 256;
-    std::array<fbxsdk::FbxTime, kBlockSize> times;
-    std::array<float, kBlockSize> values;
-    for (std::int64_t done = 0; done < count; done += kBlockSize) {
-        const auto size = static_cast<std::size_t>(std::min(kBlockSize, count - done));
-        for (std::size_t i = 0; i < size; ++i) {
-            const std::int64_t frame = range.getStartFrame() + done + static_cast<std::int64_t>(i);
-            times[i] = frameTimes.at(frame);
-            values[i] = channel.getAnimatedValue(static_cast<float>(frame)) * scale;
-        }
-        addLinearKeys(curve, std::span(times).first(size), values.data());
-    }
+    frameTimes.begin(range.getStartFrame(), static_cast<double>(range.getFrameRate()));
+    std::array<float, detail::kMostTogether> values;
+    frameTimes.inPortions(count, [&](std::int64_t frame, std::span<const fbxsdk::FbxTime> times) {
+        for (std::size_t i = 0; i < times.size(); ++i)
+            values[i] = channel.getAnimatedValue(static_cast<float>(frame + static_cast<std::int64_t>(i))) * scale;
+        addLinearKeys(curve, times, values.data());
+        return true;
+    });
 }
 
 using LocalProperty = fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3> fbxsdk::FbxNode::*;

@@ -6,7 +6,7 @@
 
 #include "FbxSdk.h"
 
-#include "FrameTimes.h"
+#include "access/FrameTimes.h"
 #include "calls/MemoryLimit.h"
 
 namespace Tarnell::Fbx::detail {

@@ -4,17 +4,20 @@
 // Global transforms, frame by frame: evaluated by the platform, decomposed here.
 #include "GlobalSampler.h"
 
-#include "NodeGeometry.h"
 #include "PropertySampling.h"
-#include "model/SameBits.h"
+#include "access/FrameTimes.h"
+#include "access/NodeGeometry.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstring>
+#include <tuple>
 
 namespace Tarnell::Fbx {
 
 using detail::GlobalRuns;
 using detail::GlobalSampler;
+using detail::kMostTogether;
 using detail::toFloat;
 
 namespace {
@@ -44,31 +47,93 @@ bool isAnimated(const fbxsdk::FbxNode& node) {
 /// Position, rotation in degrees and scale, as the nine channels store them.
 using Placement = std::array<float, 9>;
 
-/// Decomposes matrices. A motion without rotation costs little: rotation and scale of the previous matrix are reused
-/// while the first three rows are equal.
-class Decomposition {
-public:
-    explicit Decomposition(FbxSdk& sdk) : mSdk(sdk) {}
+bool isWithoutPerspective(const fbxsdk::FbxAMatrix& matrix) {
+    return matrix.Get(0, 3) == 0.0 && matrix.Get(1, 3) == 0.0 && matrix.Get(2, 3) == 0.0;
+}
 
-    const Placement& of(const fbxsdk::FbxAMatrix& matrix) {
-        const fbxsdk::FbxVector4 t = matrix.GetT();
-        // kept: an exactly zero translation selects the decomposition; they differ near gimbal lock
-        const bool atOrigin = t[0] == 0.0 && t[1] == 0.0 && t[2] == 0.0;
-        const auto* elements = static_cast<const double*>(matrix);
-        const bool isTurned = !std::equal(mAxes.begin(), mAxes.end(), elements,
-                                          [](double a, double b) { return detail::haveSameBits(a, b); });
-        if (!mHasLast || atOrigin != mAtOrigin || isTurned) {
-            std::memcpy(mAxes.data(), elements, sizeof mAxes);
-            mAtOrigin = atOrigin;
-            mHasLast = true;
-            turnAndScale(matrix);
+/// Multiplies matrices by an offset. The first three rows of a product depend on all of the matrix but the amounts of
+/// its translation.
+class Offset {
+public:
+    explicit Offset(const fbxsdk::FbxAMatrix& offset) : mOffset(offset), mIsPlain(isWithoutPerspective(offset)) {}
+
+    fbxsdk::FbxAMatrix product(const fbxsdk::FbxAMatrix& matrix) const { return matrix * mOffset; }
+
+    /// Whether the first three rows of the product are the same, to the bit, as those for the last matrix for which
+    /// this was false.
+    bool keepsAxes(const fbxsdk::FbxAMatrix& matrix) {
+        // The translation is multiplied by zero: its sign is the sign of a sum that is zero, infinities make it NaN.
+        std::array<bool, 3> signs;
+        bool isFinite = true;
+        for (int i = 0; i < 3; ++i) {
+            signs[static_cast<std::size_t>(i)] = std::signbit(matrix.Get(3, i));
+            isFinite = isFinite && std::isfinite(matrix.Get(3, i));
         }
-        for (int i = 0; i < 3; ++i)
-            mPlacement[static_cast<std::size_t>(i)] = toFloat(t[i]);
-        return mPlacement;
+        const auto* elements = static_cast<const double*>(matrix);
+        if (mAreKnown && isFinite && signs == mSigns && std::memcmp(elements, mRows.data(), sizeof mRows) == 0 &&
+            matrix.Get(3, 3) == 1.0)
+            return true;
+        std::memcpy(mRows.data(), elements, sizeof mRows);
+        mSigns = signs;
+        mAreKnown = mIsPlain && isFinite && matrix.Get(3, 3) == 1.0;
+        return false;
+    }
+
+    /// A coordinate of the product's translation.
+    double translation(const fbxsdk::FbxAMatrix& matrix, int i) const {
+        return matrix.Get(0, i) * mOffset.Get(3, 0) + matrix.Get(1, i) * mOffset.Get(3, 1) +
+               matrix.Get(2, i) * mOffset.Get(3, 2) + matrix.Get(3, i) * mOffset.Get(3, 3);
     }
 
 private:
+    fbxsdk::FbxAMatrix mOffset;
+    bool mIsPlain;
+    bool mAreKnown = false;
+    std::array<double, 12> mRows{};
+    std::array<bool, 3> mSigns{};
+};
+
+/// Decomposes the matrices of a node with an offset. A motion without rotation costs little: rotation and scale of the
+/// previous matrix are reused while the first three rows are equal.
+class Decomposition {
+public:
+    Decomposition(FbxSdk& sdk, bool isTurned, const fbxsdk::FbxAMatrix& offset)
+        : mSdk(sdk), mIsTurned(isTurned), mOffset(offset) {}
+
+    /// The placement that the node's global matrix gives.
+    const Placement& of(const fbxsdk::FbxAMatrix& matrix) {
+        static const fbxsdk::FbxAMatrix turn = lightAxisTurn();
+        if (mIsTurned)
+            return ofProduct(mOffset.product(matrix * turn));
+        if (!mOffset.keepsAxes(matrix))
+            return ofProduct(mOffset.product(matrix));
+        const std::array<double, 3> translation = {mOffset.translation(matrix, 0), mOffset.translation(matrix, 1),
+                                                   mOffset.translation(matrix, 2)};
+        return isAtOrigin(translation) == mAtOrigin ? place(translation) : ofProduct(mOffset.product(matrix));
+    }
+
+private:
+    const Placement& ofProduct(const fbxsdk::FbxAMatrix& matrix) {
+        const std::array<double, 3> translation = {matrix.Get(3, 0), matrix.Get(3, 1), matrix.Get(3, 2)};
+        const auto* elements = static_cast<const double*>(matrix);
+        const bool isTurned = std::memcmp(mRows.data(), elements, sizeof mRows) != 0;
+        if (!mHasLast || isAtOrigin(translation) != mAtOrigin || isTurned) {
+            std::memcpy(mRows.data(), elements, sizeof mRows);
+            mAtOrigin = isAtOrigin(translation);
+            mHasLast = true;
+            turnAndScale(matrix);
+        }
+        return place(translation);
+    }
+
+    // kept: an exactly zero translation selects the decomposition; they differ near gimbal lock
+    static bool isAtOrigin(const std::array<double, 3>& t) { return t[0] == 0.0 && t[1] == 0.0 && t[2] == 0.0; }
+
+    const Placement& place(const std::array<double, 3>& translation) {
+        std::transform(translation.begin(), translation.end(), mPlacement.begin(), toFloat);
+        return mPlacement;
+    }
+
     void turnAndScale(const fbxsdk::FbxAMatrix& matrix) {
         if (mAtOrigin)
             mSdk.extractMatrixRotation(matrix, mPlacement[3], mPlacement[4], mPlacement[5]);
@@ -83,7 +148,9 @@ private:
     }
 
     FbxSdk& mSdk;
-    std::array<double, 12> mAxes{}; // the first three rows
+    bool mIsTurned;
+    Offset mOffset;
+    std::array<double, 12> mRows{}; // of the product that was decomposed last
     bool mAtOrigin = false;
     bool mHasLast = false;
     Placement mPlacement{};
@@ -93,19 +160,11 @@ private:
 
 struct GlobalSampler::MovingNode {
     MovingNode(FbxSdk& sdk, fbxsdk::FbxNode& sampled, const fbxsdk::FbxAMatrix& offset)
-        : node(sampled), isTurned(shinesAlongAnAxis(sampled)), geometric(offset), decomposition(sdk) {}
+        : node(sampled), decomposition(sdk, shinesAlongAnAxis(sampled), offset) {}
 
-    const Placement& at(const fbxsdk::FbxTime& moment) { return of(globalTransform(node, moment)); }
-
-    /// The placement that the node's global matrix gives.
-    const Placement& of(const fbxsdk::FbxAMatrix& matrix) {
-        static const fbxsdk::FbxAMatrix turn = lightAxisTurn();
-        return decomposition.of(isTurned ? matrix * turn * geometric : matrix * geometric);
-    }
+    const Placement& at(const fbxsdk::FbxTime& moment) { return decomposition.of(globalTransform(node, moment)); }
 
     fbxsdk::FbxNode& node;
-    bool isTurned;
-    fbxsdk::FbxAMatrix geometric;
     Decomposition decomposition;
     GlobalRuns runs;
     std::size_t spreadCount = 0; // of runs that take memory for every frame
@@ -161,32 +220,36 @@ bool GlobalSampler::begin(MovingNode& node, SampleAccount& account) const {
     return false;
 }
 
-/// Adds a sample; returns whether there is memory for it.
-bool GlobalSampler::add(MovingNode& node, const fbxsdk::FbxAMatrix& matrix, SampleAccount& account) const {
-    const Placement& placement = node.of(matrix);
-    for (std::size_t i = 0; i < placement.size(); ++i) {
+/// Adds some samples, at most kMostTogether; returns whether there is memory for them.
+bool GlobalSampler::add(MovingNode& node, std::span<const fbxsdk::FbxAMatrix> matrices, SampleAccount& account) const {
+    std::array<std::array<float, kMostTogether>, std::tuple_size_v<Placement>> channels;
+    for (std::size_t frame = 0; frame < matrices.size(); ++frame) {
+        const Placement& placement = node.decomposition.of(matrices[frame]);
+        for (std::size_t i = 0; i < channels.size(); ++i)
+            channels[i][frame] = placement[i];
+    }
+    for (std::size_t i = 0; i < channels.size(); ++i) {
         SampleRun& run = node.runs[i];
         // The memory of the first channel that changes is reserved already.
-        if (run.spreadsWith(placement[i]) && node.spreadCount++ > 0 &&
+        if (run.spreadsWith(channels[i].data(), matrices.size()) && node.spreadCount++ > 0 &&
             !account.take(mFrames, mRate, /*channelCount*/ 1)) {
-            account.take(mFrames, mRate, placement.size() - node.spreadCount);
+            account.take(mFrames, mRate, channels.size() - node.spreadCount);
             return false;
         }
-        run.add(placement[i]);
+        run.add(channels[i].data(), matrices.size());
     }
     return true;
 }
 
 /// Continues by some frames; returns whether there is memory for more.
-bool GlobalSampler::goOn(MovingNode& node, std::span<const fbxsdk::FbxTime> times, SampleAccount& account) const {
-    std::array<fbxsdk::FbxAMatrix, 64> matrices;
+bool GlobalSampler::goOn(MovingNode& node, std::span<const fbxsdk::FbxTime> times, SampleAccount& account) {
+    mMatrices.resize(kMostTogether);
     while (!times.empty()) {
-        const std::size_t count = std::min(matrices.size(), times.size());
-        globalTransforms(node.node, times.first(count), matrices.data());
+        const std::size_t count = std::min(kMostTogether, times.size());
+        globalTransforms(node.node, times.first(count), mMatrices.data());
         times = times.subspan(count);
-        for (std::size_t i = 0; i < count; ++i)
-            if (!add(node, matrices[i], account))
-                return false;
+        if (!add(node, std::span(mMatrices).first(count), account))
+            return false;
     }
     return true;
 }

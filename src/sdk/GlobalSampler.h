@@ -62,8 +62,8 @@ private:
     Ancestry ancestryOf(const fbxsdk::FbxNode& node);
     fbxsdk::FbxTime timeOf(std::int64_t frame) const;
     bool begin(MovingNode& node, SampleAccount& account) const;
-    bool goOn(MovingNode& node, std::span<const fbxsdk::FbxTime> times, SampleAccount& account) const;
-    bool add(MovingNode& node, const fbxsdk::FbxAMatrix& matrix, SampleAccount& account) const;
+    bool goOn(MovingNode& node, std::span<const fbxsdk::FbxTime> times, SampleAccount& account);
+    bool add(MovingNode& node, std::span<const fbxsdk::FbxAMatrix> matrices, SampleAccount& account) const;
 
     FbxSdk& mSdk;
     SampleRange mFrames;
@@ -73,6 +73,7 @@ private:
     std::unique_ptr<MovingNode> mTaken;
     std::unordered_map<const fbxsdk::FbxNode*, Ancestry> mAncestries;
     int mDepth = 1;
+    std::vector<fbxsdk::FbxAMatrix> mMatrices; // of some frames
 };
 
 } // namespace Tarnell::Fbx::detail

@@ -123,27 +123,24 @@ bool PropertySampler::isConstant() const {
 bool PropertySampler::sampleFrames(const SampleRange& range) {
     const std::int64_t count = frameCount(range.first, range.last);
     mSamples.begin(static_cast<std::size_t>(count));
-    mFrameTimes.begin(range.first, mRate); // kept: the scene's rate, also of frames converted to another one
+    mFrameTimes.begin(range.first,
+                      static_cast<double>(mRate)); // kept: the scene's rate, also of frames converted to another one
     if (isConstant()) {
         mSamples.setConstant(valueAt(mFrameTimes.at(range.first)));
         return true;
     }
     if (!mAccount.take(range, mRate, /*channelCount*/ 1))
         return false;
-    constexpr std::int64_t kBlockSize = 256;
-    std::array<fbxsdk::FbxTime, kBlockSize> times;
-    std::array<float, kBlockSize> sums, values;
-    for (std::int64_t done = 0; done < count; done += kBlockSize) {
-        const auto size = static_cast<std::size_t>(std::min(kBlockSize, count - done));
-        for (std::size_t i = 0; i < size; ++i)
-            times[i] = mFrameTimes.at(range.first + done + static_cast<std::int64_t>(i));
+    std::array<float, kMostTogether> sums, values;
+    mFrameTimes.inPortions(count, [&](std::int64_t /*frame*/, std::span<const fbxsdk::FbxTime> times) {
         sums.fill(0.0f);
         for (fbxsdk::FbxAnimCurve* curve : mCurves) {
-            evaluateEach(*curve, std::span(times).first(size), values.data());
-            std::transform(sums.begin(), sums.begin() + size, values.begin(), sums.begin(), std::plus<>());
+            evaluateEach(*curve, times, values.data());
+            std::transform(sums.begin(), sums.begin() + times.size(), values.begin(), sums.begin(), std::plus<>());
         }
-        mSamples.add(sums.data(), size);
-    }
+        mSamples.add(sums.data(), times.size());
+        return true;
+    });
     if (mSamples.isOneValue())
         mAccount.giveBack(range);
     return true;

@@ -4,11 +4,12 @@
 // Conversion of an animated property of the scene to a channel: its static value, and one sample per whole frame.
 #pragma once
 
-#include "FrameTimes.h"
 #include "SampleAccount.h"
 #include "SampleRange.h"
+#include "access/FrameTimes.h"
 #include "access/SampleRun.h"
 #include "access/TimeModeScope.h"
+#include "access/ToFloat.h"
 
 #include "TnFbxCamera.h"
 #include "TnFbxLight.h"
@@ -22,9 +23,6 @@
 #include <vector>
 
 namespace Tarnell::Fbx::detail {
-
-/// Rounds to the nearest float; a value out of range becomes infinite, as in IEEE 754.
-inline float toFloat(double value) { return static_cast<float>(value); }
 
 /// The channel that many positions after another one in its enumeration.
 template <class Channel>

@@ -7,11 +7,11 @@
 #include "FbxSdk.h"
 
 #include "GlobalSampler.h"
-#include "NodeGeometry.h"
 #include "NodeMasks.h"
 #include "PointCacheScope.h"
 #include "ReadScope.h"
 #include "access/FileWarnings.h"
+#include "access/NodeGeometry.h"
 #include "access/NodeWalk.h"
 #include "access/TimeModeScope.h"
 #include "calls/LastError.h"

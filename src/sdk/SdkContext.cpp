@@ -5,12 +5,12 @@
 // animation stack with the range of frames to read.
 #include "FbxSdk.h"
 
-#include "FrameTimes.h"
 #include "GlobalSampler.h"
 #include "PropertySampling.h"
 #include "SampleAccount.h"
 #include "SampleRange.h"
 #include "access/FileWarnings.h"
+#include "access/FrameTimes.h"
 #include "access/NodeWalk.h"
 #include "access/Normalisation.h"
 #include "access/ObjectWarnings.h"

@@ -5,8 +5,8 @@
 // the cache until they are applied. The link mode determines how a point's influences add up.
 #include "FbxSdk.h"
 
-#include "NodeGeometry.h"
 #include "SkinClusters.h"
+#include "access/NodeGeometry.h"
 
 #include <algorithm>
 #include <array>

@@ -6,9 +6,9 @@
 #include "FbxSdk.h"
 
 #include "GlobalSampler.h"
-#include "NodeGeometry.h"
 #include "PropertySampling.h"
 #include "ReadScope.h"
+#include "access/NodeGeometry.h"
 #include "access/RotationOrders.h"
 #include "calls/LastError.h"
 #include "calls/MemoryLimit.h"

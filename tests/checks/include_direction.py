@@ -50,8 +50,9 @@ RULES = (
          # Only the bundled platform has extensions: builds against another one omit the includes.
          frozenset({("src/MaximumThreads.cpp", "<fbxsdk/extensions/Threads.h>"),
                     ("src/access/ItemReader.h", "<fbxsdk/extensions/ItemRuns.h>"),
+                    ("src/access/NodeGeometry.h", "<fbxsdk/extensions/NodeSamples.h>"),
+                    ("src/access/NodeGeometry.h", "<fbxsdk/extensions/PropertySamples.h>"),
                     ("src/sdk/CurveWriting.cpp", "<fbxsdk/extensions/CurveSamples.h>"),
-                    ("src/sdk/NodeGeometry.h", "<fbxsdk/extensions/NodeSamples.h>"),
                     ("src/sdk/PropertySampling.cpp", "<fbxsdk/extensions/CurveSamples.h>")})),
     Rule(("include/Fbx[!P]*.h",), re.compile("<fbxsdk.h>"), frozenset(),
          "where file names ignore case that is FbxSdk.h: public headers include FbxPlatform.h"),

@@ -17,21 +17,25 @@ JsonWriter::~JsonWriter() {
     }
 }
 
-void JsonWriter::key(std::string_view name) {
-    text(name);
-    put(mPretty ? ": " : ":");
-    mAfterKey = true;
+namespace {
+
+/// Whether nothing has to be escaped. Without leaving the loop early: so characters are compared several at a time.
+bool isPlain(std::string_view text) {
+    bool plain = true;
+    for (const char c : text)
+        plain &= c >= ' ' && c <= '~' && c != '"' && c != '\\';
+    return plain;
 }
 
+} // namespace
+
 void JsonWriter::text(std::string_view value) {
-    const auto isPlain = [](char c) { return c >= ' ' && c <= '~' && c != '"' && c != '\\'; };
-    if (std::all_of(value.begin(), value.end(), isPlain)) {
+    if (isPlain(value)) {
         separate();
-        put("\"");
+        put('"');
         put(value);
-        put("\"");
-        if (mLevels.empty())
-            flush();
+        put('"');
+        finishValue();
         return;
     }
     // Names may contain anything; invalid UTF-8 becomes the replacement character.
@@ -61,7 +65,7 @@ void JsonWriter::reals(float value, std::size_t count) {
     real(value);
     std::string next = ","; // the size that each of the others adds
     if (mPretty)
-        next += '\n' + std::string(2 * mLevels.size(), ' ');
+        next += '\n' + std::string(2 * static_cast<std::size_t>(mDepth), ' ');
     char digits[32];
     const auto [end, error] = std::to_chars(digits, digits + sizeof digits, value);
     next += std::isfinite(value) ? std::string_view(digits, static_cast<std::size_t>(end - digits)) : "null";
@@ -77,42 +81,29 @@ void JsonWriter::reals(float value, std::size_t count) {
 
 void JsonWriter::open(char bracket) {
     separate();
-    put({&bracket, 1});
-    mLevels.emplace_back();
+    put(bracket);
+    ++mDepth;
+    mIsFirst = true;
 }
 
 void JsonWriter::close(char bracket) {
-    const bool wasEmpty = mLevels.back().empty;
-    mLevels.pop_back();
-    if (!wasEmpty)
+    --mDepth;
+    if (!mIsFirst)
         breakLine();
-    put({&bracket, 1});
-    if (mLevels.empty())
-        flush();
+    put(bracket);
+    mIsFirst = false; // what was closed is a value of the level above
+    finishValue();
 }
 
-void JsonWriter::separate() {
-    if (mAfterKey || mLevels.empty()) {
-        mAfterKey = false;
-        return;
-    }
-    if (!mLevels.back().empty)
-        put(",");
-    mLevels.back().empty = false;
-    breakLine();
-}
-
-void JsonWriter::breakLine() {
-    if (!mPretty)
-        return;
-    put("\n");
-    for (std::size_t i = 0; i < mLevels.size(); ++i)
+void JsonWriter::indent() {
+    put('\n');
+    for (int i = 0; i < mDepth; ++i)
         put("  ");
 }
 
 void JsonWriter::flush() {
-    mOut.write(mBlock.data(), static_cast<std::streamsize>(mBlock.size()));
-    mBlock.clear();
+    mOut.write(mBlock.get(), static_cast<std::streamsize>(mUsed));
+    mUsed = 0;
 }
 
 } // namespace tool

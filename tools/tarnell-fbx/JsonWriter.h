@@ -6,10 +6,12 @@
 
 #include <charconv>
 #include <cmath>
+#include <cstddef>
+#include <cstring>
+#include <memory>
 #include <ostream>
 #include <string>
 #include <string_view>
-#include <vector>
 
 namespace tool {
 
@@ -27,7 +29,11 @@ public:
     void beginArray() { open('['); }
     void endArray() { close(']'); }
 
-    void key(std::string_view name);
+    void key(std::string_view name) {
+        text(name);
+        put(mPretty ? ": " : ":");
+        mAfterKey = true;
+    }
     void text(std::string_view value);
     void null() { raw("null"); }
     void boolean(bool value) { raw(value ? "true" : "false"); }
@@ -51,44 +57,80 @@ private:
     void open(char bracket);
     void close(char bracket);
     /// The comma or line break before the next value.
-    void separate();
+    void separate() {
+        if (mAfterKey || mDepth == 0) {
+            mAfterKey = false;
+            return;
+        }
+        if (!mIsFirst)
+            put(',');
+        mIsFirst = false;
+        breakLine();
+    }
     void raw(std::string_view characters) {
         separate();
         put(characters);
-        if (mLevels.empty())
+        finishValue();
+    }
+    void finishValue() {
+        if (mDepth == 0)
             flush();
     }
     /// To the stream in blocks: an insertion of its own for each number takes longer than formatting it.
     void put(std::string_view characters) {
-        constexpr std::size_t kBlockSize = std::size_t{1} << 16;
-        mBlock += characters;
-        if (mBlock.size() >= kBlockSize)
+        if (characters.size() > room(characters.size())) {
+            mOut.write(characters.data(), static_cast<std::streamsize>(characters.size()));
+            return;
+        }
+        std::memcpy(mBlock.get() + mUsed, characters.data(), characters.size());
+        mUsed += characters.size();
+    }
+    void put(char character) {
+        room(1);
+        mBlock[mUsed++] = character;
+    }
+    /// Makes room for some characters, unless they are more than a block holds; returns how many fit.
+    std::size_t room(std::size_t size) {
+        if (size > kBlockSize - mUsed)
             flush();
+        return kBlockSize - mUsed;
     }
     void flush();
-    template <class Real>
-    void finite(Real value) {
-        if (std::isfinite(value))
-            number(value);
-        else
-            null();
+    void finite(double value) { std::isfinite(value) ? number(value) : null(); }
+    void finite(float value) {
+        // Whole numbers that are never shorter with an exponent.
+        constexpr float kMostPlain = 99999.0F;
+        if (value >= -kMostPlain && value <= kMostPlain) {
+            const auto whole = static_cast<int>(value);
+            if (static_cast<float>(whole) == value && (whole != 0 || !std::signbit(value)))
+                return number(whole);
+        }
+        std::isfinite(value) ? number(value) : null();
     }
     template <class Number>
     void number(Number value) {
-        char digits[32];
-        const auto [end, error] = std::to_chars(digits, digits + sizeof digits, value);
-        raw(std::string_view(digits, static_cast<std::size_t>(end - digits)));
+        constexpr std::size_t kMostDigits = 32;
+        separate();
+        room(kMostDigits);
+        char* const first = mBlock.get() + mUsed;
+        mUsed += static_cast<std::size_t>(std::to_chars(first, first + kMostDigits, value).ptr - first);
+        finishValue();
     }
-    void breakLine();
+    void breakLine() {
+        if (mPretty)
+            indent();
+    }
+    void indent();
 
-    struct Level {
-        bool empty = true;
-    };
+    static constexpr std::size_t kBlockSize = std::size_t{1} << 16;
+
     std::ostream& mOut;
-    std::string mBlock; ///< that is not in the stream yet
+    std::unique_ptr<char[]> mBlock{new char[kBlockSize]}; ///< whose first characters are not in the stream yet
+    std::size_t mUsed = 0;
     bool mPretty;
     bool mAfterKey = false;
-    std::vector<Level> mLevels;
+    bool mIsFirst = true; ///< whether the next value is the first one of its object or array
+    int mDepth = 0;       ///< of objects and arrays
 };
 
 } // namespace tool

@@ -165,8 +165,8 @@ NodeEvaluation& currentState(FbxNode& node) {
         evaluationBudgetOf(manager).release(state);
         bindTransform(node, state);
         state.revision = manager.revision;
-        state.chain = NodeEvaluation::Chain::unknown;
-        state.hasStillGlobal = false;
+        state.chain = Chain::unknown;
+        state.hasStillAxes = state.hasStillGlobal = false;
     }
     return state;
 }
@@ -227,35 +227,46 @@ Linear linearPart(const GlobalTransform& parent, const LocalTransform& local, co
     return rotation * scaled(scale, local.scaling);
 }
 
-GlobalTransform combine(const GlobalTransform* parent, const LocalTransform& local,
-                        FbxTransform::EInheritType inherit) {
+/// The node's global transform from that of its parent, which is null at the root.
+GlobalTransform combine(const GlobalTransform* parent, const LocalTransform& local, NodeEvaluation& state) {
     if (!parent)
         return {scaled(local.rotation, local.scaling), local.translation, local.rotation, local.scaling};
+    const Vector3 translation = imageOf(parent->matrix, parent->translation, local.translation);
+    if (state.hasStillAxes) {
+        GlobalTransform global = state.stillGlobal;
+        global.translation = translation;
+        return global;
+    }
     const Linear rotation = parent->rotation * local.rotation;
-    return {linearPart(*parent, local, rotation, inherit),
-            imageOf(parent->matrix, parent->translation, local.translation), rotation, local.scaling};
+    return {linearPart(*parent, local, rotation, state.inherit), translation, rotation, local.scaling};
+}
+
+Chain motionOf(const NodeEvaluation& state) {
+    if (!state.animation)
+        return Chain::isStatic;
+    return state.animation->rotation.animated() || state.animation->scaling.animated() ? Chain::animated
+                                                                                       : Chain::translated;
 }
 
 /// Determines for the node and its ancestors which are static together with all nodes above them: those have one
-/// transform for all times.
+/// transform for all times. Where nothing rotates or scales, only the translations differ.
 NodeEvaluation& stateWithChain(FbxNode& node) {
     NodeEvaluation& asked = currentState(node);
-    if (asked.chain != NodeEvaluation::Chain::unknown)
+    if (asked.chain != Chain::unknown)
         return asked;
     std::vector<FbxNode*> unknown;
-    bool isStatic = true;
+    Chain chain = Chain::isStatic;
     for (FbxNode* each = &node; each; each = each->GetParent()) {
         NodeEvaluation& state = currentState(*each);
-        if (state.chain != NodeEvaluation::Chain::unknown) {
-            isStatic = state.chain == NodeEvaluation::Chain::isStatic;
+        if (state.chain != Chain::unknown) {
+            chain = state.chain;
             break;
         }
         unknown.push_back(each);
     }
     for (auto each = unknown.rbegin(); each != unknown.rend(); ++each) {
         NodeEvaluation& state = (*each)->evaluation();
-        isStatic = isStatic && !state.animation;
-        state.chain = isStatic ? NodeEvaluation::Chain::isStatic : NodeEvaluation::Chain::animated;
+        chain = state.chain = std::max(chain, motionOf(state));
     }
     return asked;
 }
@@ -265,58 +276,150 @@ const GlobalTransform* knownTransform(NodeEvaluation& state, EvaluationBudget& b
     return state.hasStillGlobal ? &state.stillGlobal : budget.find(state, number);
 }
 
-/// Goes up to the nearest ancestor with a cached transform and down again. The transform of a static node is cached for
-/// all times.
-GlobalTransform globalAt(FbxNode& node, const FbxTime& time) {
-    EvaluationBudget& budget = evaluationBudgetOf(node.GetFbxManager()->data());
-    NodeEvaluation& asked = stateWithChain(node);
-    if (asked.hasStillGlobal)
-        return asked.stillGlobal;
-    const bool moves = asked.chain == NodeEvaluation::Chain::animated;
-    const std::uint64_t number = moves ? budget.times.numberOf(time.Get()) : 0;
+/// Some times, at most kMostTimes, and their numbers.
+struct Moments {
+    Moments(const FbxTime* first, int howMany, bool isStatic, EvaluationBudget& budget)
+        : times(first), count(static_cast<std::size_t>(howMany)) {
+        for (std::size_t i = 0; i < count; ++i)
+            numbers[i] = isStatic ? 0 : budget.times.numberOf(times[i].Get());
+    }
 
-    std::vector<FbxNode*>& path = budget.path;
-    path.clear();
-    GlobalTransform transform;
-    const GlobalTransform* known = nullptr;
-    for (FbxNode* each = &node; each && !known; each = each->GetParent()) {
-        known = knownTransform(each->evaluation(), budget, number);
-        if (!known)
-            path.push_back(each);
-    }
-    for (auto each = path.rbegin(); each != path.rend(); ++each) {
-        NodeEvaluation& state = (*each)->evaluation();
-        transform = combine(known, localAt(state, time), state.inherit);
-        known = &transform;
-        if (state.chain == NodeEvaluation::Chain::isStatic) {
-            state.stillGlobal = transform;
-            state.hasStillGlobal = true;
-        } else if ((*each)->GetChildCount() > 0) {
-            budget.store(state, number, transform);
-        }
-    }
-    return path.empty() ? *known : transform;
+    const FbxTime* times;
+    std::size_t count;
+    std::array<std::uint64_t, kMostTimes> numbers; // not needed where nothing moves
+};
+
+/// Keeps what does not depend on the time.
+void keepStill(NodeEvaluation& state, const GlobalTransform& transform) {
+    if (state.chain == Chain::animated || state.hasStillAxes)
+        return;
+    state.stillGlobal = transform;
+    state.hasStillAxes = true;
+    state.hasStillGlobal = state.chain == Chain::isStatic;
 }
 
-/// At some times, at most kMostTimes, in any order. The node or one above it is animated.
-void globalsAt(FbxNode& node, NodeEvaluation& state, const FbxTime* times, int count, FbxAMatrix* matrices) {
-    EvaluationBudget& budget = evaluationBudgetOf(node.GetFbxManager()->data());
-    FbxNode* parent = node.GetParent();
-    std::array<LocalTransform, kMostTimes> locals;
-    localsAt(state, times, count, locals.data());
-    for (int i = 0; i < count; ++i) {
-        const std::uint64_t number = budget.times.numberOf(times[i].Get());
-        const GlobalTransform* above = parent ? knownTransform(parent->evaluation(), budget, number) : nullptr;
-        GlobalTransform evaluated;
-        if (parent && !above) {
-            evaluated = globalAt(*parent, times[i]);
-            above = &evaluated;
+/// The evaluation of a node at some times, and of those above it whose transforms are not cached.
+class WayDown {
+public:
+    /// Goes up to the nearest ancestors with cached transforms, or to the root.
+    WayDown(FbxNode& node, const Moments& moments, EvaluationBudget& budget, GlobalTransform* transforms)
+        : mMoments(moments), mBudget(budget), mTransforms(transforms) {
+        mBudget.path.clear();
+        std::fill_n(mStart.begin(), moments.count, kUnknown);
+        std::size_t missing = moments.count;
+        for (FbxNode* each = &node; each && missing > 0; each = each->GetParent()) {
+            missing -= takeKnown(each->evaluation());
+            if (missing > 0)
+                mBudget.path.push_back(each);
         }
-        const GlobalTransform global = combine(above, locals[static_cast<std::size_t>(i)], state.inherit);
-        if (node.GetChildCount() > 0)
-            budget.store(state, number, global);
+    }
+
+    /// And down again, to the node itself.
+    void go() {
+        for (std::size_t place = mBudget.path.size(); place-- > 0;)
+            step(*mBudget.path[place], place);
+    }
+
+private:
+    static constexpr std::size_t kUnknown = static_cast<std::size_t>(-1);
+
+    /// Takes what is cached with a node; returns how many.
+    std::size_t takeKnown(NodeEvaluation& state) {
+        std::size_t taken = 0;
+        for (std::size_t i = 0; i < mMoments.count; ++i) {
+            if (mStart[i] != kUnknown)
+                continue;
+            if (const GlobalTransform* known = knownTransform(state, mBudget, mMoments.numbers[i])) {
+                mTransforms[i] = *known;
+                mStart[i] = mBudget.path.size();
+                ++taken;
+            }
+        }
+        return taken;
+    }
+
+    /// From the parent's transforms to those of the node at a place of the path.
+    void step(FbxNode& node, std::size_t place) {
+        std::size_t count = 0;
+        for (std::size_t i = 0; i < mMoments.count; ++i) {
+            if (mStart[i] <= place)
+                continue;
+            mIndices[count] = i;
+            mTimes[count++] = mMoments.times[i];
+        }
+        NodeEvaluation& state = node.evaluation();
+        std::array<LocalTransform, kMostTimes> locals;
+        localsAt(state, mTimes.data(), static_cast<int>(count), locals.data());
+        for (std::size_t k = 0; k < count; ++k) {
+            GlobalTransform& transform = mTransforms[mIndices[k]];
+            transform = combine(node.GetParent() ? &transform : nullptr, locals[k], state);
+            keepStill(state, transform);
+            if (!state.hasStillGlobal && node.GetChildCount() > 0)
+                mBudget.store(state, mMoments.numbers[mIndices[k]], transform);
+        }
+    }
+
+    const Moments& mMoments;
+    EvaluationBudget& mBudget;
+    GlobalTransform* mTransforms;                 ///< at each of the times
+    std::array<std::size_t, kMostTimes> mStart;   ///< the place in the path below which each is known
+    std::array<std::size_t, kMostTimes> mIndices; ///< of the times of a step
+    std::array<FbxTime, kMostTimes> mTimes;       ///< of a step
+};
+
+/// At some times, at most kMostTimes, in any order; only the first one of a static node.
+void globalsAt(FbxNode& node, NodeEvaluation& state, const FbxTime* times, int count, GlobalTransform* transforms) {
+    EvaluationBudget& budget = evaluationBudgetOf(node.GetFbxManager()->data());
+    const Moments moments(times, count, state.chain == Chain::isStatic, budget);
+    WayDown(node, moments, budget, transforms).go();
+}
+
+GlobalTransform globalAt(FbxNode& node, const FbxTime& time) {
+    NodeEvaluation& state = stateWithChain(node);
+    if (state.hasStillGlobal)
+        return state.stillGlobal;
+    GlobalTransform transform;
+    globalsAt(node, state, &time, 1, &transform);
+    return transform;
+}
+
+/// The matrices of a node that moves and has no children, where all transforms of its parent are cached; false where
+/// they are not.
+bool writeBelowKnown(FbxNode& node, NodeEvaluation& state, const FbxTime* times, int count, FbxAMatrix* matrices) {
+    FbxNode* const parent = node.GetParent();
+    if (!parent || node.GetChildCount() > 0)
+        return false;
+    EvaluationBudget& budget = evaluationBudgetOf(node.GetFbxManager()->data());
+    const Moments moments(times, count, /*isStatic*/ false, budget);
+    std::array<const GlobalTransform*, kMostTimes> above;
+    for (std::size_t i = 0; i < static_cast<std::size_t>(count); ++i)
+        if (above[i] = knownTransform(parent->evaluation(), budget, moments.numbers[i]); !above[i])
+            return false;
+    std::array<LocalTransform, kMostTimes> locals;
+    if (state.animation)
+        localsAt(state, times, count, locals.data());
+    for (std::size_t i = 0; i < static_cast<std::size_t>(count); ++i) {
+        const LocalTransform& local = state.animation ? locals[i] : state.still;
+        if (state.hasStillAxes) {
+            write(matrices[i], state.stillGlobal.matrix,
+                  imageOf(above[i]->matrix, above[i]->translation, local.translation));
+            continue;
+        }
+        const GlobalTransform global = combine(above[i], local, state);
+        keepStill(state, global);
         write(matrices[i], global.matrix, global.translation);
     }
+    return true;
+}
+
+/// At some times, at most kMostTimes, of a node that moves.
+void writeMatrices(FbxNode& node, NodeEvaluation& state, const FbxTime* times, int count, FbxAMatrix* matrices) {
+    if (writeBelowKnown(node, state, times, count, matrices))
+        return;
+    std::array<GlobalTransform, kMostTimes> transforms;
+    globalsAt(node, state, times, count, transforms.data());
+    for (std::size_t i = 0; i < static_cast<std::size_t>(count); ++i)
+        write(matrices[i], transforms[i].matrix, transforms[i].translation);
 }
 
 } // namespace
@@ -439,13 +542,13 @@ FbxAMatrix& FbxNode::EvaluateGlobalTransform(FbxTime pTime, FbxNode::EPivotSet, 
 
 void extensions::evaluateGlobalTransforms(FbxNode& node, const FbxTime* times, int count, FbxAMatrix* matrices) {
     detail::NodeEvaluation& state = detail::stateWithChain(node);
-    if (state.chain == detail::NodeEvaluation::Chain::isStatic) {
+    if (state.chain == detail::Chain::isStatic) {
         if (count > 0)
             std::fill_n(matrices, count, node.EvaluateGlobalTransform(times[0]));
         return;
     }
     for (int done = 0; done < count; done += detail::kMostTimes)
-        detail::globalsAt(node, state, times + done, std::min(detail::kMostTimes, count - done), matrices + done);
+        detail::writeMatrices(node, state, times + done, std::min(detail::kMostTimes, count - done), matrices + done);
 }
 
 FbxAMatrix& FbxNode::EvaluateLocalTransform(FbxTime pTime, FbxNode::EPivotSet, bool, bool) {

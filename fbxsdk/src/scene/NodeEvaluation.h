@@ -77,6 +77,14 @@ private:
 
 struct TransformBinding;
 
+/// How a node moves in the world, with the nodes above it.
+enum class Chain : std::uint8_t {
+    unknown,
+    isStatic,
+    translated, ///< translations are animated, and nothing else
+    animated
+};
+
 /// The evaluation state that a node owns.
 struct NodeEvaluation {
     NodeEvaluation();
@@ -89,10 +97,10 @@ struct NodeEvaluation {
     std::unique_ptr<TransformBinding> animation; ///< null when nothing animates the node itself
     FbxTransform::EInheritType inherit = FbxTransform::eInheritRrSs;
 
-    enum class Chain : std::uint8_t { unknown, isStatic, animated };
-    Chain chain = Chain::unknown; ///< whether the node or any ancestor is animated
-    bool hasStillGlobal = false;
-    GlobalTransform stillGlobal{}; ///< of a node that is static, and so are its ancestors
+    Chain chain = Chain::unknown;
+    bool hasStillAxes = false;   ///< all of what follows but the translation, of a node that is translated at most
+    bool hasStillGlobal = false; ///< all of it, of a static one
+    GlobalTransform stillGlobal{};
 
     TransformCache cache; ///< of a node that has children and moves
     // Links of the list of nodes with a cache, most recently used first.

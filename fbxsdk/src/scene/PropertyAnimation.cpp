@@ -2,6 +2,8 @@
 // Copyright (c) Tarnell FBX contributors
 //
 // The curves of a property, found and created through the curve node that a layer has for it.
+#include <algorithm>
+#include <array>
 #include <cstring>
 
 #include <fbxsdk/FbxAnimCurve.h>
@@ -10,6 +12,7 @@
 #include <fbxsdk/FbxAnimStack.h>
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
+#include <fbxsdk/extensions/PropertySamples.h>
 
 #include "animation/PropertyEvaluation.h"
 #include "object/PropertyConversion.h"
@@ -106,6 +109,25 @@ void FbxProperty::evaluate(void* pValue, EFbxType pType, const FbxTime& pTime) {
         return;
     const detail::Components value = detail::evaluateAnimation(animation, pTime, orderInForce(*mObject));
     detail::convertNumbers(value, pValue, pType);
+}
+
+void extensions::evaluate(FbxPropertyT<FbxDouble3>& property, const FbxTime* times, int count, FbxDouble3* values) {
+    std::fill_n(values, std::max(count, 0), property.Get());
+    FbxScene* scene = property.IsValid() ? property.GetFbxObject()->GetScene() : nullptr;
+    if (!scene)
+        return;
+    detail::AnimatedProperty animation = detail::bindAnimation(property, scene->GetCurrentAnimationStack());
+    if (!animation.animated())
+        return;
+    const FbxEuler::EOrder order = orderInForce(*property.GetFbxObject());
+    std::array<detail::Components, detail::kMostTimes> evaluated;
+    for (int done = 0; done < count; done += detail::kMostTimes) {
+        const int size = std::min(detail::kMostTimes, count - done);
+        detail::evaluateAnimation(animation, times + done, size, order, evaluated.data());
+        for (int i = 0; i < size; ++i)
+            if (times[done + i] != FBXSDK_TIME_INFINITE)
+                detail::convertNumbers(evaluated[static_cast<std::size_t>(i)], &values[done + i], eFbxDouble3);
+    }
 }
 
 FBXSDK_NAMESPACE_END

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Two matrices of a node for reading and deforming.
+// The matrices of a node for reading and deforming, and the vectors they come from.
 #pragma once
 
 #include <fbxsdk.h>
@@ -11,6 +11,7 @@
 
 #ifndef TARNELL_FBX_EXTERNAL_FBXSDK
 #include <fbxsdk/extensions/NodeSamples.h>
+#include <fbxsdk/extensions/PropertySamples.h>
 #endif
 
 namespace Tarnell::Fbx::detail {
@@ -29,6 +30,17 @@ inline void globalTransforms(fbxsdk::FbxNode& node, std::span<const fbxsdk::FbxT
                    [&node](const fbxsdk::FbxTime& time) { return globalTransform(node, time); });
 #else
     fbxsdk::extensions::evaluateGlobalTransforms(node, times.data(), static_cast<int>(times.size()), matrices);
+#endif
+}
+
+/// A vector of the node at many times, over all layers.
+inline void vectorsAt(fbxsdk::FbxPropertyT<fbxsdk::FbxDouble3>& property, std::span<const fbxsdk::FbxTime> times,
+                      fbxsdk::FbxDouble3* values) {
+#ifdef TARNELL_FBX_EXTERNAL_FBXSDK
+    std::transform(times.begin(), times.end(), values,
+                   [&property](const fbxsdk::FbxTime& time) { return property.EvaluateValue(time); });
+#else
+    fbxsdk::extensions::evaluate(property, times.data(), static_cast<int>(times.size()), values);
 #endif
 }
 

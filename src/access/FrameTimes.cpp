@@ -11,7 +11,7 @@ constexpr std::size_t kMostKeptTimes = std::size_t{1} << 16;
 
 } // namespace
 
-void detail::FrameTimes::begin(std::int64_t firstFrame, float rate) {
+void detail::FrameTimes::begin(std::int64_t firstFrame, double rate) {
     if (mFirstFrame != firstFrame || mRate != rate)
         mTimes.clear();
     mFirstFrame = firstFrame;
@@ -20,7 +20,7 @@ void detail::FrameTimes::begin(std::int64_t firstFrame, float rate) {
 
 fbxsdk::FbxTime detail::FrameTimes::timeOf(std::int64_t frame) {
     fbxsdk::FbxTime time;
-    time.SetSecondDouble(static_cast<double>(frame) / static_cast<double>(mRate));
+    time.SetSecondDouble(static_cast<double>(frame) / mRate);
     if (mTimes.size() < kMostKeptTimes)
         mTimes.push_back(time);
     return time;
