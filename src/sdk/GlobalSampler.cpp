@@ -63,11 +63,11 @@ public:
     /// this was false.
     bool keepsAxes(const fbxsdk::FbxAMatrix& matrix) {
         // The translation is multiplied by zero: its sign is the sign of a sum that is zero, infinities make it NaN.
-        std::array<bool, 3> signs;
+        unsigned signs = 0;
         bool isFinite = true;
         for (int i = 0; i < 3; ++i) {
-            signs[static_cast<std::size_t>(i)] = std::signbit(matrix.Get(3, i));
-            isFinite = isFinite && std::isfinite(matrix.Get(3, i));
+            signs = 2 * signs + (std::signbit(matrix.Get(3, i)) ? 1 : 0);
+            isFinite &= std::isfinite(matrix.Get(3, i));
         }
         const auto* elements = static_cast<const double*>(matrix);
         if (mAreKnown && isFinite && signs == mSigns && std::memcmp(elements, mRows.data(), sizeof mRows) == 0 &&
@@ -90,7 +90,7 @@ private:
     bool mIsPlain;
     bool mAreKnown = false;
     std::array<double, 12> mRows{};
-    std::array<bool, 3> mSigns{};
+    unsigned mSigns = 0;
 };
 
 /// Decomposes the matrices of a node with an offset. A motion without rotation costs little: rotation and scale of the

@@ -49,36 +49,21 @@ public:
     }
 
     void transform(TnFbxTransform& object) {
+        static const auto kKeys = keysOf<TnFbxTransform::EFbxTransformChannelType>(
+            [](auto channel) { return TnFbxTransform::getTransformChannelName(channel); });
         mJson.key("name");
         mJson.text(object.getName());
         enumerator("rotationOrder", {"XYZ", "XZY", "YXZ", "YZX", "ZXY", "ZYX"}, object.getTransformRotationOrder());
-        mJson.key("transform");
-        mJson.beginObject();
-        for (int i = 0;; ++i) {
-            const auto channel = static_cast<TnFbxTransform::EFbxTransformChannelType>(i);
-            const char* name = TnFbxTransform::getTransformChannelName(channel);
-            if (!name)
-                break;
-            mJson.key(name);
-            print(*object.getTransformChannel(channel));
-        }
-        mJson.endObject();
+        print<TnFbxTransform::EFbxTransformChannelType>("transform", kKeys, [&](auto channel) -> const TnFbxChannel& {
+            return *object.getTransformChannel(channel);
+        });
     }
 
     /// All channels of a class with named channels of its own.
     template <class Object, class Channel, class Find>
     void channels(const Find& find) {
-        mJson.key("channels");
-        mJson.beginObject();
-        for (int i = 0;; ++i) {
-            const auto channel = static_cast<Channel>(i);
-            const char* name = Object::getChannelName(channel);
-            if (!name)
-                break;
-            mJson.key(name);
-            print(find(channel));
-        }
-        mJson.endObject();
+        static const auto kKeys = keysOf<Channel>([](auto channel) { return Object::getChannelName(channel); });
+        print<Channel>("channels", kKeys, find);
     }
 
     void details(TnFbxCamera& camera) {
@@ -124,6 +109,26 @@ public:
     }
 
 private:
+    /// The keys of all channels of a class.
+    template <class Channel, class NameOf>
+    static std::vector<JsonKey> keysOf(const NameOf& nameOf) {
+        std::vector<JsonKey> keys;
+        while (const char* name = nameOf(static_cast<Channel>(keys.size())))
+            keys.emplace_back(name);
+        return keys;
+    }
+
+    template <class Channel, class Find>
+    void print(const char* key, const std::vector<JsonKey>& keys, const Find& find) {
+        mJson.key(key);
+        mJson.beginObject();
+        for (std::size_t i = 0; i < keys.size(); ++i) {
+            mJson.key(keys[i]);
+            print(find(static_cast<Channel>(i)));
+        }
+        mJson.endObject();
+    }
+
     /// Markers give no access to their channels.
     static TnFbxChannel copyOf(const TnFbxMarker& marker, TnFbxMarker::EFbxMarkerChannelType channel) {
         TnFbxChannel copy;
@@ -144,15 +149,18 @@ private:
             return;
         }
         const TnFbxTime time = channel.getTime();
+        static const JsonKey kValue("value"), kStart("start"), kEnd("end"), kRate("rate"), kSamples("samples");
         mJson.beginObject();
-        number("value", channel.getValue());
-        mJson.key("start");
+        mJson.key(kValue);
+        mJson.real(channel.getValue());
+        mJson.key(kStart);
         mJson.integer(time.getStartFrame());
-        mJson.key("end");
+        mJson.key(kEnd);
         mJson.integer(time.getEndFrame());
-        number("rate", time.getFrameRate());
+        mJson.key(kRate);
+        mJson.real(time.getFrameRate());
         if (mSamples) {
-            mJson.key("samples");
+            mJson.key(kSamples);
             mJson.beginArray();
             samples(channel, time.getStartFrame(), time.getEndFrame());
             mJson.endArray();

@@ -27,17 +27,8 @@ bool isPlain(std::string_view text) {
     return plain;
 }
 
-} // namespace
-
-void JsonWriter::text(std::string_view value) {
-    if (isPlain(value)) {
-        separate();
-        put('"');
-        put(value);
-        put('"');
-        finishValue();
-        return;
-    }
+/// With the quotes.
+std::string escaped(std::string_view value) {
     // Names may contain anything; invalid UTF-8 becomes the replacement character.
     const std::string text =
         nlohmann::json(std::string(value)).dump(-1, ' ', false, nlohmann::json::error_handler_t::replace);
@@ -55,7 +46,21 @@ void JsonWriter::text(std::string_view value) {
             escaped += text[i];
         }
     }
-    raw(escaped);
+    return escaped;
+}
+
+} // namespace
+
+JsonKey::JsonKey(std::string_view name) : mQuoted(escaped(name)) {}
+
+void JsonWriter::text(std::string_view value) {
+    if (!isPlain(value))
+        return raw(escaped(value));
+    separate();
+    put('"');
+    put(value);
+    put('"');
+    finishValue();
 }
 
 void JsonWriter::reals(float value, std::size_t count) {
@@ -63,12 +68,16 @@ void JsonWriter::reals(float value, std::size_t count) {
     if (count == 0)
         return;
     real(value);
+    if (count == 1)
+        return;
     std::string next = ","; // the size that each of the others adds
     if (mPretty)
         next += '\n' + std::string(2 * static_cast<std::size_t>(mDepth), ' ');
-    char digits[32];
-    const auto [end, error] = std::to_chars(digits, digits + sizeof digits, value);
-    next += std::isfinite(value) ? std::string_view(digits, static_cast<std::size_t>(end - digits)) : "null";
+    char digits[kFloatRoom];
+    if (std::isfinite(value))
+        next.append(digits, writeShortest(digits, value));
+    else
+        next += "null";
 
     std::size_t left = count - 1;
     std::string block;

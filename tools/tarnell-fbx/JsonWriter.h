@@ -13,7 +13,19 @@
 #include <string>
 #include <string_view>
 
+#include "FloatText.h"
+
 namespace tool {
+
+/// A key that is written many times: escaped once.
+class JsonKey {
+public:
+    explicit JsonKey(std::string_view name);
+
+private:
+    friend class JsonWriter;
+    std::string mQuoted;
+};
 
 /// Writes one JSON document. Calls must nest properly: a value in an object follows a key. What was written has reached
 /// the stream when the outermost value ends.
@@ -34,6 +46,12 @@ public:
         put(mPretty ? ": " : ":");
         mAfterKey = true;
     }
+    void key(const JsonKey& name) {
+        separate();
+        put(name.mQuoted);
+        put(mPretty ? ": " : ":");
+        mAfterKey = true;
+    }
     void text(std::string_view value);
     void null() { raw("null"); }
     void boolean(bool value) { raw(value ? "true" : "false"); }
@@ -42,8 +60,18 @@ public:
     void digits(std::string_view spelling) { raw(spelling.find_first_of("in") == spelling.npos ? spelling : "null"); }
     void natural(unsigned long long value) { number(value); }
     /// Shortest digits that read back as the same number; null for NaN and infinities.
-    void real(float value) { finite(value); }
-    void real(double value) { finite(value); }
+    void real(float value) {
+        if (std::isfinite(value))
+            written([value](char* first) { return writeShortest(first, value); });
+        else
+            null();
+    }
+    void real(double value) {
+        if (std::isfinite(value))
+            number(value);
+        else
+            null();
+    }
     /// The same value that many times, as elements of an array.
     void reals(float value, std::size_t count);
 
@@ -96,25 +124,18 @@ private:
         return kBlockSize - mUsed;
     }
     void flush();
-    void finite(double value) { std::isfinite(value) ? number(value) : null(); }
-    void finite(float value) {
-        // Whole numbers that are never shorter with an exponent.
-        constexpr float kMostPlain = 99999.0F;
-        if (value >= -kMostPlain && value <= kMostPlain) {
-            const auto whole = static_cast<int>(value);
-            if (static_cast<float>(whole) == value && (whole != 0 || !std::signbit(value)))
-                return number(whole);
-        }
-        std::isfinite(value) ? number(value) : null();
+    /// What `write` writes from a position on, which it returns the end of.
+    template <class Write>
+    void written(const Write& write) {
+        separate();
+        room(kFloatRoom);
+        char* const first = mBlock.get() + mUsed;
+        mUsed += static_cast<std::size_t>(write(first) - first);
+        finishValue();
     }
     template <class Number>
     void number(Number value) {
-        constexpr std::size_t kMostDigits = 32;
-        separate();
-        room(kMostDigits);
-        char* const first = mBlock.get() + mUsed;
-        mUsed += static_cast<std::size_t>(std::to_chars(first, first + kMostDigits, value).ptr - first);
-        finishValue();
+        written([value](char* first) { return std::to_chars(first, first + kFloatRoom, value).ptr; });
     }
     void breakLine() {
         if (mPretty)

@@ -181,33 +181,41 @@ void valuesAt(AnimatedProperty& property, const FbxTime* times, int count, Compo
         std::fill_n(values, count, property.staticValue);
 }
 
-/// At some times, at most kMostTimes.
-void localsAt(NodeEvaluation& state, const FbxTime* times, int count, LocalTransform* locals) {
-    if (!state.animation) {
-        std::fill_n(locals, count, state.still);
-        return;
+/// A node's local transforms at some times, at most kMostTimes.
+class Locals {
+public:
+    Locals(NodeEvaluation& state, const FbxTime* times, std::size_t count) : mState(state) {
+        if (state.animation)
+            evaluate(*state.animation, times, static_cast<int>(count));
     }
-    TransformBinding& binding = *state.animation;
-    std::array<Components, kMostTimes> translations, rotations, scalings;
-    valuesAt(binding.translation, times, count, translations.data());
-    valuesAt(binding.scaling, times, count, scalings.data());
-    if (binding.rotation.animated())
-        evaluateAnimation(binding.rotation, times, count, binding.order, rotations.data());
-    for (int i = 0; i < count; ++i) {
-        const auto at = static_cast<std::size_t>(i);
-        const bool isStill = times[i] == FBXSDK_TIME_INFINITE;
-        const Linear& turn =
-            binding.rotation.animated() && !isStill ? turnOf(binding, rotations[at]) : state.still.rotation;
-        locals[i] = isStill ? state.still : localOf(binding, translations[at], turn, scalings[at]);
+
+    [[nodiscard]] const LocalTransform& at(std::size_t i) const {
+        return mState.animation ? mTransforms[i] : mState.still;
     }
-}
+
+private:
+    void evaluate(TransformBinding& binding, const FbxTime* times, int count) {
+        std::array<Components, kMostTimes> translations, rotations, scalings;
+        valuesAt(binding.translation, times, count, translations.data());
+        valuesAt(binding.scaling, times, count, scalings.data());
+        if (binding.rotation.animated())
+            evaluateAnimation(binding.rotation, times, count, binding.order, rotations.data());
+        for (std::size_t i = 0; i < static_cast<std::size_t>(count); ++i) {
+            const bool isStill = times[i] == FBXSDK_TIME_INFINITE;
+            const Linear& turn =
+                binding.rotation.animated() && !isStill ? turnOf(binding, rotations[i]) : mState.still.rotation;
+            mTransforms[i] = isStill ? mState.still : localOf(binding, translations[i], turn, scalings[i]);
+        }
+    }
+
+    const NodeEvaluation& mState;
+    std::array<LocalTransform, kMostTimes> mTransforms; // not needed of a static node
+};
 
 LocalTransform localAt(NodeEvaluation& state, const FbxTime& time) {
     if (!state.animation || time == FBXSDK_TIME_INFINITE)
         return state.still;
-    LocalTransform local;
-    localsAt(state, &time, 1, &local);
-    return local;
+    return Locals(state, &time, 1).at(0);
 }
 
 /// The linear part of a global matrix; the three inherit types differ in where the parent's scale enters. A node that
@@ -227,18 +235,23 @@ Linear linearPart(const GlobalTransform& parent, const LocalTransform& local, co
     return rotation * scaled(scale, local.scaling);
 }
 
-/// The node's global transform from that of its parent, which is null at the root.
-GlobalTransform combine(const GlobalTransform* parent, const LocalTransform& local, NodeEvaluation& state) {
-    if (!parent)
-        return {scaled(local.rotation, local.scaling), local.translation, local.rotation, local.scaling};
+/// The node's global transform from that of its parent, which is null at the root and may be the result itself.
+void combine(const GlobalTransform* parent, const LocalTransform& local, const NodeEvaluation& state,
+             GlobalTransform& result) {
+    if (!parent) {
+        result = {scaled(local.rotation, local.scaling), local.translation, local.rotation, local.scaling};
+        return;
+    }
     const Vector3 translation = imageOf(parent->matrix, parent->translation, local.translation);
     if (state.hasStillAxes) {
-        GlobalTransform global = state.stillGlobal;
-        global.translation = translation;
-        return global;
+        result = state.stillGlobal;
+    } else {
+        const Linear rotation = parent->rotation * local.rotation;
+        result.matrix = linearPart(*parent, local, rotation, state.inherit);
+        result.rotation = rotation;
+        result.scaling = local.scaling;
     }
-    const Linear rotation = parent->rotation * local.rotation;
-    return {linearPart(*parent, local, rotation, state.inherit), translation, rotation, local.scaling};
+    result.translation = translation;
 }
 
 Chain motionOf(const NodeEvaluation& state) {
@@ -348,11 +361,10 @@ private:
             mTimes[count++] = mMoments.times[i];
         }
         NodeEvaluation& state = node.evaluation();
-        std::array<LocalTransform, kMostTimes> locals;
-        localsAt(state, mTimes.data(), static_cast<int>(count), locals.data());
+        const Locals locals(state, mTimes.data(), count);
         for (std::size_t k = 0; k < count; ++k) {
             GlobalTransform& transform = mTransforms[mIndices[k]];
-            transform = combine(node.GetParent() ? &transform : nullptr, locals[k], state);
+            combine(node.GetParent() ? &transform : nullptr, locals.at(k), state, transform);
             keepStill(state, transform);
             if (!state.hasStillGlobal && node.GetChildCount() > 0)
                 mBudget.store(state, mMoments.numbers[mIndices[k]], transform);
@@ -395,17 +407,16 @@ bool writeBelowKnown(FbxNode& node, NodeEvaluation& state, const FbxTime* times,
     for (std::size_t i = 0; i < static_cast<std::size_t>(count); ++i)
         if (above[i] = knownTransform(parent->evaluation(), budget, moments.numbers[i]); !above[i])
             return false;
-    std::array<LocalTransform, kMostTimes> locals;
-    if (state.animation)
-        localsAt(state, times, count, locals.data());
+    const Locals locals(state, times, static_cast<std::size_t>(count));
     for (std::size_t i = 0; i < static_cast<std::size_t>(count); ++i) {
-        const LocalTransform& local = state.animation ? locals[i] : state.still;
+        const LocalTransform& local = locals.at(i);
         if (state.hasStillAxes) {
             write(matrices[i], state.stillGlobal.matrix,
                   imageOf(above[i]->matrix, above[i]->translation, local.translation));
             continue;
         }
-        const GlobalTransform global = combine(above[i], local, state);
+        GlobalTransform global;
+        combine(above[i], local, state, global);
         keepStill(state, global);
         write(matrices[i], global.matrix, global.translation);
     }
