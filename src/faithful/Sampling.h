@@ -12,8 +12,10 @@
 #include "access/ToFloat.h"
 
 #include <array>
+#include <cmath>
 #include <cstddef>
 #include <cstdint>
+#include <limits>
 #include <span>
 
 namespace Tarnell::Fbx::faithful {
@@ -29,13 +31,19 @@ public:
     template <class Values>
     void add(const Values& values) {
         for (std::size_t i = 0; i < kCount; ++i)
-            mValues[i][mSize] = toFloat(values[i]) + 0.0f; // zero and minus zero are equal
+            mValues[i][mSize] = sampleOf(toFloat(values[i]));
         ++mSize;
     }
     const float* operator[](std::size_t i) const { return mValues[i].data(); }
     std::size_t size() const { return mSize; }
 
 private:
+    /// Zero and minus zero are equal, and so is everything that is not a number: the sign of that depends on the
+    /// compiler.
+    static float sampleOf(float value) {
+        return std::isnan(value) ? std::numeric_limits<float>::quiet_NaN() : value + 0.0f;
+    }
+
     std::array<std::array<float, detail::kMostTogether>, kCount> mValues;
     std::size_t mSize = 0; // at most kMostTogether
 };

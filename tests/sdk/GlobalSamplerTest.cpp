@@ -11,6 +11,7 @@
 
 #include <gtest/gtest.h>
 
+#include <array>
 #include <cmath>
 #include <cstring>
 #include <memory>
@@ -105,6 +106,60 @@ public:
         addNode("aside");
     }
 };
+
+/// What the nine channels are without the memory of frames before: the documented decomposition of each product.
+std::array<float, 9> placementAt(TestScene& scene, fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& offset, int frame) {
+    const fbxsdk::FbxAMatrix matrix = node.EvaluateGlobalTransform(test::timeOfFrame(frame)) * offset;
+    const fbxsdk::FbxVector4 place = matrix.GetT(), angles = matrix.GetR(), scale = matrix.GetS();
+    std::array<float, 9> values{};
+    for (int i = 0; i < 3; ++i) {
+        const auto at = static_cast<std::size_t>(i);
+        values[at] = static_cast<float>(place[i]);
+        values[3 + at] = static_cast<float>(angles[i]);
+        values[6 + at] = static_cast<float>(scale[i]);
+    }
+    if (place[0] == 0.0 && place[1] == 0.0 && place[2] == 0.0)
+        scene.sdk.extractMatrixRotation(matrix, values[3], values[4], values[5]);
+    return values;
+}
+
+TEST(ListsInTheWorld, KeepAxesOnlyWhileTheyHaveTheSameBits) {
+    constexpr int kFirst = -300, kLast = 300;
+    TestScene scene(kFirst, kLast);
+    const auto mover = [&](const fbxsdk::FbxDouble3& angles) {
+        fbxsdk::FbxNode* node = scene.addNode("mover");
+        node->LclRotation.Set(angles);
+        // Through the origin, where another decomposition applies, and where the sign changes.
+        scene.key(node->LclTranslation, "X", {{kFirst, -300.0f}, {kLast, 300.0f}});
+        scene.key(node->LclTranslation, "Y", {{kFirst, 30.0f}, {0, 0.0f}, {kLast, 30.0f}});
+        return node;
+    };
+    fbxsdk::FbxNode* jumping = mover({90.0, 89.9999, -20.0});
+    scene.key(jumping->LclRotation, "Z", {{-20, 0.0f}, {20, 0.0f}, {21, 50.0f}, {40, 50.0f}});
+    const std::vector<fbxsdk::FbxNode*> nodes = {mover({0.0, 0.0, 0.0}), mover({0.0, 90.0, 0.0}),
+                                                 mover({180.0, -90.0, 12.0}), jumping};
+    fbxsdk::FbxAMatrix offset;
+    offset.SetTRS(fbxsdk::FbxVector4(0.0, -0.0, 1.0), fbxsdk::FbxVector4(0.0, 180.0, 0.0),
+                  fbxsdk::FbxVector4(1.0, -2.0, 1.0));
+
+    for (fbxsdk::FbxNode* node : nodes) {
+        for (const fbxsdk::FbxAMatrix& geometric : {fbxsdk::FbxAMatrix(), offset}) {
+            Transform transform;
+            TnFbxTime time = scene.time();
+            fbxsdk::FbxAMatrix given = geometric;
+            ASSERT_TRUE(scene.sdk.getTransform(time, true, false, 0.0f, node, transform, given));
+            for (int frame = kFirst; frame <= kLast; ++frame) {
+                const std::array<float, 9> expected = placementAt(scene, *node, geometric, frame);
+                for (int i = 0; i < 9; ++i) {
+                    const float value = transform.getTransformValueAt(channelAt(i), static_cast<float>(frame));
+                    ASSERT_EQ(std::memcmp(&value, &expected[static_cast<std::size_t>(i)], sizeof value), 0)
+                        << "frame " << frame << ", channel " << i << ": " << value << " instead of "
+                        << expected[static_cast<std::size_t>(i)];
+                }
+            }
+        }
+    }
+}
 
 TEST(ListsInTheWorld, GiveTheSameBitsAsNodesReadOneByOne) {
     DeepScene listed, single;

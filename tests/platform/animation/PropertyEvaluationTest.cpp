@@ -3,8 +3,11 @@
 //
 // Values of properties over the layers of a stack, against closed forms.
 #include <cmath>
+#include <cstring>
+#include <vector>
 
 #include <fbxsdk/FbxLight.h>
+#include <fbxsdk/extensions/PropertySamples.h>
 
 #include "AnimationFixture.h"
 
@@ -28,6 +31,32 @@ protected:
 
     FbxAnimLayer* second = addLayer();
 };
+
+TEST_F(PropertyEvaluationTest, GivesTheSameBitsForManyTimesTogether) {
+    second->BlendMode.Set(FbxAnimLayer::eBlendOverridePassthrough);
+    second->Weight.Set(30.0);
+    second->RotationAccumulationMode.Set(FbxAnimLayer::eRotationByLayer);
+    node->SetRotationActive(true);
+    node->SetRotationOrder(FbxNode::eSourcePivot, FbxEuler::eOrderZYX);
+    for (FbxAnimLayer* each : {layer, second}) {
+        addKeys(node->LclRotation.GetCurve(each, "X", true), {{0, 10}, {1, -170}, {2, 300}});
+        addKeys(node->LclScaling.GetCurve(each, "Z", true), {{0, 1}, {3, -2}});
+    }
+    std::vector<FbxTime> times = {FBXSDK_TIME_INFINITE, FbxTime(INT64_MIN), FbxTime(INT64_MAX)};
+    for (int frame = -30; frame < 120; ++frame)
+        times.push_back(seconds(frame / 24.0));
+
+    for (auto property : {&FbxNode::LclTranslation, &FbxNode::LclRotation, &FbxNode::LclScaling}) {
+        std::vector<FbxDouble3> together(times.size());
+        extensions::evaluate(node->*property, times.data(), static_cast<int>(times.size()), together.data());
+        for (std::size_t i = 0; i < times.size(); ++i) {
+            const FbxDouble3 alone = (node->*property).EvaluateValue(times[i]);
+            ASSERT_EQ(std::memcmp(&together[i], &alone, sizeof alone), 0) << i;
+        }
+    }
+    FbxPropertyT<FbxDouble3> none;
+    extensions::evaluate(none, times.data(), 0, nullptr);
+}
 
 // One layer.
 

@@ -16,6 +16,7 @@
 #include "Animate.h"
 #include "NodeEvaluationFixture.h"
 #include "SeededRandom.h"
+#include "scene/NodeEvaluation.h"
 
 namespace {
 
@@ -470,6 +471,65 @@ TEST_F(NodeEvaluationTest, GivesTheSameBitsForManyTimesTogether) {
         ASSERT_EQ(std::memcmp(together.data(), before.data(), before.size() * sizeof(FbxAMatrix)), 0);
     }
     extensions::evaluateGlobalTransforms(*nodes.back(), nullptr, 0, nullptr);
+}
+
+/// A tree in which at most translations are animated. Its twin rotates and scales by level curves: it has the same
+/// transforms, and their axes are computed at every time.
+std::vector<FbxNode*> translatedTree(FbxScene& scene, bool isTwin) {
+    FbxAnimLayer* layer = addStack(scene);
+    SeededRandom random(41);
+    std::vector<FbxNode*> nodes = {scene.GetRootNode()};
+    for (int i = 0; i < 80; ++i) {
+        FbxNode* node = FbxNode::Create(&scene, ("n" + std::to_string(i)).c_str());
+        nodes[static_cast<std::size_t>(random.whole(static_cast<int>(nodes.size())))]->AddChild(node);
+        node->LclTranslation.Set(random.triple(-10, 10));
+        const auto angle = static_cast<double>(static_cast<float>(random.real(-180, 180)));
+        const auto scale = static_cast<double>(static_cast<float>(random.real(-2, 2)));
+        node->LclRotation.Set(FbxDouble3(angle, 30.0, -0.0));
+        node->LclScaling.Set(FbxDouble3(1.0, random.chance(9) ? 0.0 : scale, random.chance(9) ? 1e200 : 1.0));
+        node->SetTransformationInheritType(static_cast<FbxTransform::EInheritType>(random.whole(3)));
+        if (random.chance(2)) {
+            node->SetRotationActive(true);
+            node->SetRotationOrder(kSet, kOrders[random.whole(6)].order);
+            node->SetPreRotation(kSet, random.vector(-90, 90));
+            node->SetRotationPivot(kSet, random.vector(-5, 5));
+            node->SetScalingOffset(kSet, random.vector(-5, 5));
+        }
+        if (random.chance(3))
+            keys(node->LclTranslation, layer, "X", {{0, random.real(-9, 9)}, {1, 1e30}, {2, random.real(-9, 9)}});
+        if (isTwin) {
+            keys(node->LclRotation, layer, "X", {{0, angle}});
+            keys(node->LclScaling, layer, "X", {{0, 1.0}});
+        }
+        nodes.push_back(node);
+    }
+    return nodes;
+}
+
+TEST_F(NodeEvaluationTest, HasTheSameBitsWhereOnlyTranslationsAreAnimated) {
+    FbxScene* twin = FbxScene::Create(manager, "twin");
+    const std::vector<FbxNode*> nodes = translatedTree(*scene, false);
+    const std::vector<FbxNode*> twins = translatedTree(*twin, true);
+    std::vector<FbxTime> times = {FBXSDK_TIME_INFINITE, FbxTime(INT64_MIN), FbxTime(INT64_MAX), seconds(1e6)};
+    for (int frame = -10; frame < 80; ++frame)
+        times.push_back(seconds(frame / 24.0));
+    const int count = static_cast<int>(times.size());
+    std::vector<FbxAMatrix> matrices(times.size()), others(times.size());
+
+    int translated = 0;
+    for (std::size_t i = nodes.size(); i-- > 0;) { // children first
+        extensions::evaluateGlobalTransforms(*nodes[i], times.data(), count, matrices.data());
+        extensions::evaluateGlobalTransforms(*twins[i], times.data(), count, others.data());
+        translated += nodes[i]->evaluation().chain == detail::Chain::translated ? 1 : 0;
+        for (std::size_t at = 0; at < times.size(); ++at) {
+            ASSERT_EQ(std::memcmp(&matrices[at], &others[at], sizeof(FbxAMatrix)), 0)
+                << nodes[i]->GetName() << ' ' << at << plain::text(plain::of(matrices[at]))
+                << plain::text(plain::of(others[at]));
+            const FbxAMatrix alone = nodes[i]->EvaluateGlobalTransform(times[at]);
+            ASSERT_EQ(std::memcmp(&matrices[at], &alone, sizeof alone), 0) << nodes[i]->GetName() << ' ' << at;
+        }
+    }
+    EXPECT_GT(translated, 30);
 }
 
 TEST_F(NodeEvaluationTest, OfANodeInNoSceneIsItsStaticTransform) {

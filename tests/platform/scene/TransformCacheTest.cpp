@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cstddef>
 #include <cstdint>
+#include <map>
 #include <random>
 #include <vector>
 
@@ -263,6 +264,27 @@ TEST(TimeNumbers, GoUpByOneAndAreForgottenInTheirOrder) {
     EXPECT_EQ(numbers.numberOf(10), 1U);
     EXPECT_EQ(numbers.numberOf(50), detail::TimeNumbers::kKept + 1); // it was the oldest one
     EXPECT_EQ(numbers.numberOf(1000), 2U);
+}
+
+TEST(TimeNumbers, AreThoseOfAListOfTheLatestTimes) {
+    detail::TimeNumbers numbers;
+    std::map<std::int64_t, std::uint64_t> known;
+    std::vector<std::int64_t> latest;
+    std::minstd_rand random(5);
+    constexpr auto kKept = static_cast<std::uint64_t>(detail::TimeNumbers::kKept);
+    for (int i = 0; i < 200'000; ++i) {
+        // Times that are close together, far apart, and the same in their lower bits.
+        const auto ticks = static_cast<std::int64_t>(static_cast<std::uint64_t>(random() % 50'000) << (i % 3 * 20));
+        const auto [place, isNew] = known.emplace(ticks, latest.size());
+        ASSERT_EQ(numbers.numberOf(ticks), place->second) << i;
+        if (!isNew)
+            continue;
+        latest.push_back(ticks);
+        if (latest.size() > kKept)
+            known.erase(latest[latest.size() - 1 - kKept]);
+    }
+    EXPECT_EQ(numbers.newest() + 1, latest.size());
+    EXPECT_GT(latest.size(), 2 * kKept);
 }
 
 } // namespace
