@@ -37,7 +37,7 @@ TEST(FloatText, IsTheShortestThatReadsBack) {
     EXPECT_EQ(textOf(100000.0F), "1e+05");
     EXPECT_EQ(textOf(99999.99F), "99999.99");
     EXPECT_EQ(textOf(0.001F), "0.001");
-    EXPECT_EQ(textOf(0.0005F), "0.0005");
+    EXPECT_EQ(textOf(0.0005F), "5e-04");
 }
 
 TEST(FloatText, IsThatOfTheStandardLibraryAroundAllPowersOfTwoAndTen) {
