@@ -284,15 +284,15 @@ GlobalRuns* GlobalSampler::take(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix&
     if (mNext >= mNodes.size() || mNodes[mNext].node != &node)
         return nullptr;
     mTaken = std::move(mNodes[mNext++].moving);
-    if (!mTaken) {
-        mTaken = std::make_unique<MovingNode>(mSdk, node, geometric);
-        const Placement& placement = mTaken->at(timeOf(mFrames.first));
-        for (std::size_t i = 0; i < placement.size(); ++i) {
-            mTaken->runs[i].begin(static_cast<std::size_t>(frameCount(mFrames.first, mFrames.last)));
-            mTaken->runs[i].setConstant(placement[i]);
-        }
+    if (mTaken)
+        return &mTaken->runs;
+    Decomposition decomposition(mSdk, shinesAlongAnAxis(node), geometric);
+    const Placement& placement = decomposition.of(globalTransform(node, timeOf(mFrames.first)));
+    for (std::size_t i = 0; i < placement.size(); ++i) {
+        mStillRuns[i].begin(static_cast<std::size_t>(frameCount(mFrames.first, mFrames.last)));
+        mStillRuns[i].setConstant(placement[i]);
     }
-    return &mTaken->runs;
+    return &mStillRuns;
 }
 
 } // namespace Tarnell::Fbx

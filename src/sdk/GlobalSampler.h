@@ -71,6 +71,7 @@ private:
     std::vector<SampledNode> mNodes;
     std::size_t mNext = 0; // to be returned
     std::unique_ptr<MovingNode> mTaken;
+    GlobalRuns mStillRuns; // of the node that was taken last, if it does not move
     std::unordered_map<const fbxsdk::FbxNode*, Ancestry> mAncestries;
     int mDepth = 1;
     std::vector<fbxsdk::FbxAMatrix> mMatrices; // of some frames
