@@ -9,6 +9,7 @@
 #include "access/NodeGeometry.h"
 
 #include <algorithm>
+#include <bit>
 #include <cmath>
 #include <cstring>
 #include <tuple>
@@ -47,6 +48,17 @@ bool isAnimated(const fbxsdk::FbxNode& node) {
 /// Position, rotation in degrees and scale, as the nine channels store them.
 using Placement = std::array<float, 9>;
 
+/// The first three rows of a matrix.
+using Rows = std::array<double, 12>;
+
+/// To the bit, as haveSameBits. Without leaving the loop early: so elements are compared several at a time.
+bool areSame(const Rows& rows, const double* elements) {
+    std::uint64_t different = 0;
+    for (std::size_t i = 0; i < rows.size(); ++i)
+        different |= std::bit_cast<std::uint64_t>(rows[i]) ^ std::bit_cast<std::uint64_t>(elements[i]);
+    return different == 0;
+}
+
 bool isWithoutPerspective(const fbxsdk::FbxAMatrix& matrix) {
     return matrix.Get(0, 3) == 0.0 && matrix.Get(1, 3) == 0.0 && matrix.Get(2, 3) == 0.0;
 }
@@ -70,8 +82,7 @@ public:
             isFinite &= std::isfinite(matrix.Get(3, i));
         }
         const auto* elements = static_cast<const double*>(matrix);
-        if (mAreKnown && isFinite && signs == mSigns && std::memcmp(elements, mRows.data(), sizeof mRows) == 0 &&
-            matrix.Get(3, 3) == 1.0)
+        if (mAreKnown && isFinite && signs == mSigns && areSame(mRows, elements) && matrix.Get(3, 3) == 1.0)
             return true;
         std::memcpy(mRows.data(), elements, sizeof mRows);
         mSigns = signs;
@@ -89,7 +100,7 @@ private:
     fbxsdk::FbxAMatrix mOffset;
     bool mIsPlain;
     bool mAreKnown = false;
-    std::array<double, 12> mRows{};
+    Rows mRows{};
     unsigned mSigns = 0;
 };
 
@@ -116,7 +127,7 @@ private:
     const Placement& ofProduct(const fbxsdk::FbxAMatrix& matrix) {
         const std::array<double, 3> translation = {matrix.Get(3, 0), matrix.Get(3, 1), matrix.Get(3, 2)};
         const auto* elements = static_cast<const double*>(matrix);
-        const bool isTurned = std::memcmp(mRows.data(), elements, sizeof mRows) != 0;
+        const bool isTurned = !areSame(mRows, elements);
         if (!mHasLast || isAtOrigin(translation) != mAtOrigin || isTurned) {
             std::memcpy(mRows.data(), elements, sizeof mRows);
             mAtOrigin = isAtOrigin(translation);
@@ -150,7 +161,7 @@ private:
     FbxSdk& mSdk;
     bool mIsTurned;
     Offset mOffset;
-    std::array<double, 12> mRows{}; // of the product that was decomposed last
+    Rows mRows{}; // of the product that was decomposed last
     bool mAtOrigin = false;
     bool mHasLast = false;
     Placement mPlacement{};
