@@ -157,7 +157,7 @@ public:
     /// False for a null array, a count below 1, without a context or scene, and when there are more objects than
     /// elements; what was filled until then stays. Elements without an object stay as they are.
     ///
-    /// Animated channels get one sample for every whole frame; where all are equal they take the memory of one. False
+    /// Animated channels get one sample for every whole frame; where all are equal they take no memory. False
     /// also when the samples of a list would take more than `memoryLimit()`: `lastError()` then states the frames and
     /// the memory that they would have needed. Channels left without samples are not animated then.
     /// @{

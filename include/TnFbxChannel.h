@@ -70,8 +70,8 @@ public:
     bool moveAnimatedValues(TnFbxTime time, std::vector<float>&& values);
     /// @}
 
-    /// The same with one value for every frame of the range. It takes the memory of one sample; the memory of the
-    /// previous samples is released.
+    /// The same with one value for every frame of the range. It takes no memory; that of the previous samples is
+    /// released.
     bool setConstantValues(TnFbxTime time, float value);
 
     /// The value at a possibly fractional frame; the static value when there are no samples.
@@ -87,7 +87,7 @@ public:
     bool isConstant() const;
 
 private:
-    float sampleAt(std::size_t index) const { return mValues[mValues.size() > 1 ? index : 0]; }
+    float sampleAt(std::size_t index) const { return mValues.empty() ? mCommonValue : mValues[index]; }
     TARNELL_FBX_LOCAL std::size_t indexOf(int frame) const;
     TARNELL_FBX_LOCAL std::size_t countToCover(int frame) const;
     TARNELL_FBX_LOCAL void takeOver(const TnFbxTime& time, std::size_t count);
@@ -96,9 +96,10 @@ private:
 
     bool mAnimated;
     TnFbxTime mTime;
-    std::vector<float> mValues; // the samples, or one that all of them are equal to
+    std::vector<float> mValues; // the samples; none where all of them are equal
     std::size_t mCount;         // number of samples
     float mValue;
+    float mCommonValue; // of the samples that are all equal
 };
 
 } // namespace Tarnell::Fbx

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Samples at whole frames: how a range grows, and how it is evaluated in between. Samples that are all equal are stored
-// as one; changing one of them first stores them separately.
+// Samples at whole frames: how a range grows, and how it is evaluated in between. Samples that are all equal are one
+// number in the channel; changing one of them first stores them separately.
 //
 // Spans of frames are computed in 64 bits, so that ranges may reach from the lowest int to the highest.
 #include "TnFbxChannel.h"
@@ -10,6 +10,7 @@
 #include "FrameArithmetic.h"
 #include "SameBits.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
@@ -56,7 +57,8 @@ bool areAllEqual(const std::vector<float>& values) {
 
 } // namespace
 
-TnFbxChannel::TnFbxChannel() : mAnimated(false), mCount(0), mValue(kDefaultChannelValue) {}
+TnFbxChannel::TnFbxChannel()
+    : mAnimated(false), mCount(0), mValue(kDefaultChannelValue), mCommonValue(kDefaultChannelValue) {}
 
 TnFbxChannel::~TnFbxChannel() = default;
 
@@ -67,6 +69,7 @@ TnFbxChannel& TnFbxChannel::operator=(const TnFbxChannel& other) {
         mAnimated = other.mAnimated;
         mTime = other.mTime;
         mValue = other.mValue;
+        mCommonValue = other.mCommonValue;
     }
     return *this;
 }
@@ -102,7 +105,8 @@ bool TnFbxChannel::setValueAt(float frame, float value) {
         mAnimated = true;
         return true;
     }
-    if (countToCover(wholeFrame) > mValues.size() + kMostAddedSamples)
+    const std::size_t stored = mCount > 0 ? std::max(mValues.size(), std::size_t{1}) : 0;
+    if (countToCover(wholeFrame) > stored + kMostAddedSamples)
         return false;
     spread();
     coverFrame(wholeFrame);
@@ -128,8 +132,8 @@ std::size_t TnFbxChannel::countToCover(int frame) const {
 
 /// Stores every sample separately.
 void TnFbxChannel::spread() {
-    if (mValues.size() < mCount)
-        mValues.resize(mCount, mValues.front());
+    if (mValues.empty())
+        mValues.assign(mCount, mCommonValue);
 }
 
 // Widens the range to include a frame:
@@ -161,10 +165,12 @@ void TnFbxChannel::coverFrame(int frame) {
 bool TnFbxChannel::setAnimatedValues(TnFbxTime time, const std::vector<float>& values) {
     if (!areSamples(time, values.size()))
         return false;
-    if (areAllEqual(values))
-        mValues.assign(1, values.front());
-    else
+    if (areAllEqual(values)) {
+        mCommonValue = values.front();
+        mValues.clear();
+    } else {
         mValues = values;
+    }
     takeOver(time, values.size());
     return true;
 }
@@ -173,7 +179,12 @@ bool TnFbxChannel::moveAnimatedValues(TnFbxTime time, std::vector<float>&& value
     if (!areSamples(time, values.size()))
         return false;
     const std::size_t count = values.size();
-    mValues = areAllEqual(values) ? std::vector<float>(1, values.front()) : std::move(values);
+    if (areAllEqual(values)) {
+        mCommonValue = values.front();
+        mValues = {};
+    } else {
+        mValues = std::move(values);
+    }
     takeOver(time, count);
     return true;
 }
@@ -181,7 +192,8 @@ bool TnFbxChannel::moveAnimatedValues(TnFbxTime time, std::vector<float>&& value
 bool TnFbxChannel::setConstantValues(TnFbxTime time, float value) {
     if (!isRange(time))
         return false;
-    mValues = std::vector<float>(1, value);
+    mCommonValue = value;
+    mValues = {};
     takeOver(time, framesOf(time));
     return true;
 }
@@ -194,7 +206,7 @@ void TnFbxChannel::takeOver(const TnFbxTime& time, std::size_t count) {
 
 // The animated flag has no effect here: a channel without samples counts as static.
 float TnFbxChannel::getAnimatedValue(float frame) const {
-    if (mValues.empty() || std::isnan(frame)) // NaN is a frame outside every range
+    if (mCount == 0 || std::isnan(frame)) // NaN is a frame outside every range
         return mValue;
     const auto count = static_cast<std::int64_t>(mCount);
     if (std::fabs(frame) < kFirstInexactFrame) { // most requests are for a whole frame of the range
