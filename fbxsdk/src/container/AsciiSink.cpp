@@ -49,6 +49,9 @@ AsciiSink::AsciiSink(ByteOutput& output, std::uint32_t version) : mOutput(output
     mLineStart = mText.size();
 }
 
+AsciiSink::AsciiSink(ByteOutput& output, const AsciiSink& whole)
+    : mOutput(output), mVersion(whole.mVersion), mOpen(whole.mOpen) {}
+
 void AsciiSink::indent() { mText.append(mOpen.size(), '\t'); }
 
 void AsciiSink::endLine() {
@@ -214,6 +217,20 @@ void AsciiSink::floatBits(std::span<const std::uint32_t> words) {
     std::vector<float> numbers(words.size());
     std::transform(words.begin(), words.end(), numbers.begin(), [](auto word) { return std::bit_cast<float>(word); });
     array(numbers);
+}
+
+RecordSink::EncodedRecords AsciiSink::encoded(const Part& part) const {
+    MemoryOutput output;
+    AsciiSink fragment(output, *this);
+    part(fragment);
+    output.write(fragment.mText);
+    return {output.takeBytes(), {}};
+}
+
+void AsciiSink::repeat(const EncodedRecords& records) {
+    mText += records.bytes;
+    mLineStart = mText.size();
+    flushWhenLong();
 }
 
 void AsciiSink::heading(std::string_view title) {

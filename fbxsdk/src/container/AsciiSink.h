@@ -44,6 +44,8 @@ public:
     void array(std::span<const std::uint8_t> values) override;
     void floatBits(std::span<const std::uint32_t> words) override;
 
+    [[nodiscard]] EncodedRecords encoded(const Part& part) const override;
+    void repeat(const EncodedRecords& records) override;
     void heading(std::string_view title) override;
     [[nodiscard]] bool failed() const override { return mOutput.failed(); }
 
@@ -51,6 +53,9 @@ public:
     void finish();
 
 private:
+    /// For records that will be inserted into the text of another sink.
+    AsciiSink(ByteOutput& output, const AsciiSink& whole);
+
     struct OpenRecord {
         std::size_t valueCount = 0;
         bool hasBlock = false;

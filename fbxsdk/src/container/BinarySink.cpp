@@ -58,16 +58,16 @@ std::span<const char> fileBytes(std::span<const Number> values, std::vector<char
 } // namespace
 
 BinarySink::BinarySink(ByteOutput& output, std::uint32_t version, std::uint64_t maxNarrowSize)
-    : mOutput(output), mVersion(version), mWide(version >= kFirstWideVersion),
+    : mWindow(output), mVersion(version), mWide(version >= kFirstWideVersion),
       mMaxSize(mWide ? std::numeric_limits<std::uint64_t>::max() : maxNarrowSize) {
     char versionBytes[4];
     storeNumber(versionBytes, version);
-    mOutput.write(bytesOf(kBinaryHead));
-    mOutput.write(versionBytes);
+    mWindow.write(bytesOf(kBinaryHead));
+    mWindow.write(versionBytes);
 }
 
 BinarySink::BinarySink(ByteOutput& output, const BinarySink& whole)
-    : mOutput(output), mVersion(whole.mVersion), mWide(whole.mWide), mMaxSize(whole.mMaxSize), mIsFragment(true) {}
+    : mWindow(output), mVersion(whole.mVersion), mWide(whole.mWide), mMaxSize(whole.mMaxSize), mIsFragment(true) {}
 
 std::size_t BinarySink::headSize() const { return mWide ? 25 : 13; }
 
@@ -76,28 +76,23 @@ void BinarySink::setFault(const std::string& fault) {
         mFault = fault;
 }
 
-void BinarySink::writeZeros(std::size_t count) {
-    constexpr char kZeros[128] = {};
-    assert(count <= sizeof kZeros);
-    mOutput.write(std::span(kZeros, count));
-}
+void BinarySink::writeZeros(std::size_t count) { std::memset(mWindow.extend(count), 0, count); }
 
 void BinarySink::beginRecord(std::string_view name) {
     assert(name.size() <= std::numeric_limits<std::uint8_t>::max());
     assert(mOpen.empty() || mOpen.back().hasBlock);
-    const std::uint64_t start = mOutput.size();
-    char nameLength;
-    storeNumber(&nameLength, static_cast<std::uint8_t>(name.size()));
+    const std::uint64_t start = mWindow.size();
     writeZeros(headSize() - 1);
-    mOutput.write({&nameLength, 1});
-    mOutput.write(bytesOf(name));
+    char* const lengthAndName = mWindow.extend(1 + name.size());
+    storeNumber(lengthAndName, static_cast<std::uint8_t>(name.size()));
+    std::copy(name.begin(), name.end(), lengthAndName + 1);
     mOpen.push_back({.start = start, .valuesStart = start + headSize() + name.size()});
 }
 
 void BinarySink::beginBlock() {
     assert(!mOpen.empty() && !mOpen.back().hasBlock);
     mOpen.back().hasBlock = true;
-    mOpen.back().valuesEnd = mOutput.size();
+    mOpen.back().valuesEnd = mWindow.size();
 }
 
 void BinarySink::endRecord() {
@@ -107,14 +102,14 @@ void BinarySink::endRecord() {
     if (record.hasBlock)
         writeZeros(headSize());
     else
-        record.valuesEnd = mOutput.size();
+        record.valuesEnd = mWindow.size();
     checkSize();
     if (!failed())
         patchHead(record);
 }
 
 void BinarySink::checkSize() {
-    if (mOutput.size() > mMaxSize) {
+    if (mWindow.size() > mMaxSize) {
         setFault("the file exceeds the " + std::to_string(mMaxSize) + " bytes that a binary file of version " +
                  std::to_string(mVersion) + " can have; files of version " + std::to_string(kFirstWideVersion) +
                  " can be larger");
@@ -122,12 +117,12 @@ void BinarySink::checkSize() {
 }
 
 void BinarySink::patchHead(const OpenRecord& record) {
-    const std::uint64_t fields[] = {mOutput.size(), record.valueCount, record.valuesEnd - record.valuesStart};
+    const std::uint64_t fields[] = {mWindow.size(), record.valueCount, record.valuesEnd - record.valuesStart};
     char head[3 * sizeof(std::uint64_t)];
     std::size_t size = 0;
     for (const std::uint64_t field : fields)
         size += storeOffset(head + size, field);
-    mOutput.overwrite(record.start, std::span(head, size));
+    mWindow.overwrite(record.start, std::span(head, size));
     if (mIsFragment)
         mHeads.push_back(record.start);
 }
@@ -155,7 +150,10 @@ void BinarySink::parts(std::span<const Part> list) {
     fragments.reserve(list.size());
     for (MemoryOutput& output : outputs)
         fragments.emplace_back(new BinarySink(output, *this));
-    forEachInParallel(list.size(), [&](std::size_t i) { list[i](*fragments[i]); });
+    forEachInParallel(list.size(), [&](std::size_t i) {
+        list[i](*fragments[i]);
+        fragments[i]->mWindow.flush();
+    });
     for (std::size_t i = 0; i < list.size(); ++i) {
         append(*fragments[i], outputs[i].takeBytes());
         fragments[i].reset();
@@ -163,27 +161,52 @@ void BinarySink::parts(std::span<const Part> list) {
 }
 
 void BinarySink::append(const BinarySink& fragment, std::string bytes) {
-    const bool swap = needsSwap(/*bigEndian*/ false);
-    const std::uint64_t place = mOutput.size();
+    const std::uint64_t place = mWindow.size();
     for (const std::uint64_t head : fragment.mHeads) {
-        char* const end = bytes.data() + head;
         if (mIsFragment)
             mHeads.push_back(place + head);
-        storeOffset(end, place + (mWide ? loadNumber<std::uint64_t>(end, swap) : loadNumber<std::uint32_t>(end, swap)));
+        moveHead(bytes.data() + head, place);
     }
-    mOutput.write(bytes);
+    mWindow.write(bytes);
     if (!fragment.mFault.empty())
         setFault(fragment.mFault);
+    checkSize();
+}
+
+/// Adds to the offset of the record's end.
+void BinarySink::moveHead(char* head, std::uint64_t distance) const {
+    const bool swap = needsSwap(/*bigEndian*/ false);
+    storeOffset(head,
+                distance + (mWide ? loadNumber<std::uint64_t>(head, swap) : loadNumber<std::uint32_t>(head, swap)));
+}
+
+RecordSink::EncodedRecords BinarySink::encoded(const Part& part) const {
+    MemoryOutput output;
+    BinarySink fragment(output, *this);
+    part(fragment);
+    fragment.mWindow.flush();
+    assert(output.size() < OutputWindow::kBytes && fragment.mFault.empty());
+    return {output.takeBytes(), {fragment.mHeads.begin(), fragment.mHeads.end()}};
+}
+
+void BinarySink::repeat(const EncodedRecords& records) {
+    const std::uint64_t place = mWindow.size();
+    char* const bytes = mWindow.extend(records.bytes.size());
+    std::copy(records.bytes.begin(), records.bytes.end(), bytes);
+    for (const std::uint32_t head : records.places) {
+        if (mIsFragment)
+            mHeads.push_back(place + head);
+        moveHead(bytes + head, place);
+    }
     checkSize();
 }
 
 template <class Number>
 void BinarySink::scalar(char code, Number value) {
     assert(!mOpen.empty() && !mOpen.back().hasBlock);
-    char bytes[1 + sizeof(Number)];
+    char* const bytes = mWindow.extend(1 + sizeof(Number));
     bytes[0] = code;
     storeNumber(bytes + 1, value);
-    mOutput.write(bytes);
     ++mOpen.back().valueCount;
 }
 
@@ -203,7 +226,7 @@ void BinarySink::sizedBytes(char code, std::string_view first, std::string_view 
     }
     scalar(code, static_cast<std::uint32_t>(size));
     for (const std::string_view part : {first, second, third})
-        mOutput.write(bytesOf(part));
+        mWindow.write(bytesOf(part));
 }
 
 void BinarySink::text(std::string_view value) { sizedBytes('S', value); }
@@ -240,8 +263,8 @@ void BinarySink::packedArray(char code, std::span<const Number> values) {
     char head[8];
     storeNumber(head, std::uint32_t{compressed});
     storeNumber(head + 4, static_cast<std::uint32_t>(bytes.size()));
-    mOutput.write(head);
-    mOutput.write(bytes);
+    mWindow.write(head);
+    mWindow.write(bytes);
 }
 
 template <class Number>
@@ -269,15 +292,16 @@ void BinarySink::floatBits(std::span<const std::uint32_t> words) { arrayOf('f', 
 void BinarySink::finish(const CreationTime& time) {
     assert(mOpen.empty());
     writeZeros(headSize());
-    mOutput.write(bytesOf(footerCode(time)));
+    mWindow.write(bytesOf(footerCode(time)));
     // Aligned or not, there is padding.
-    writeZeros(kFooterAlignment - mOutput.size() % kFooterAlignment);
+    writeZeros(kFooterAlignment - mWindow.size() % kFooterAlignment);
     writeZeros(sizeof(std::uint32_t));
     char versionBytes[4];
     storeNumber(versionBytes, mVersion);
-    mOutput.write(versionBytes);
+    mWindow.write(versionBytes);
     writeZeros(kFooterZeros);
-    mOutput.write(bytesOf(kFooterMagic));
+    mWindow.write(bytesOf(kFooterMagic));
+    mWindow.flush();
 }
 
 } // namespace detail

@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
-#include "container/ByteOutput.h"
 #include "container/FileId.h"
+#include "container/OutputWindow.h"
 #include "container/RecordSink.h"
 #include "container/ZlibStream.h"
 
@@ -47,10 +47,15 @@ public:
     void floatBits(std::span<const std::uint32_t> words) override;
 
     void parts(std::span<const Part> list) override;
+    [[nodiscard]] EncodedRecords encoded(const Part& part) const override;
+    void repeat(const EncodedRecords& records) override;
 
-    [[nodiscard]] bool failed() const override { return !mFault.empty() || mOutput.failed(); }
+    [[nodiscard]] bool failed() const override { return !mFault.empty() || mWindow.failed(); }
     /// What cannot be written in this version; empty when nothing but perhaps the output failed.
     [[nodiscard]] const std::string& fault() const { return mFault; }
+
+    /// Bytes of the file so far, those that are not passed to the output yet included.
+    [[nodiscard]] std::uint64_t size() const { return mWindow.size(); }
 
     /// Ends the last list of records and writes the footer. All records must be ended.
     void finish(const CreationTime& time);
@@ -72,6 +77,7 @@ private:
     void checkSize();
     void patchHead(const OpenRecord& record);
     void append(const BinarySink& fragment, std::string bytes);
+    void moveHead(char* head, std::uint64_t distance) const;
     std::size_t storeOffset(char* bytes, std::uint64_t offset) const;
     void writeZeros(std::size_t count);
     template <class Number>
@@ -84,7 +90,7 @@ private:
     template <class Number>
     void scalarList(char code, std::span<const Number> values);
 
-    ByteOutput& mOutput;
+    OutputWindow mWindow;
     std::uint32_t mVersion;
     bool mWide;
     std::uint64_t mMaxSize;

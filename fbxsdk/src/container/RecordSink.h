@@ -8,7 +8,9 @@
 #include <cstdint>
 #include <functional>
 #include <span>
+#include <string>
 #include <string_view>
+#include <vector>
 
 #include <fbxsdk/FbxArch.h>
 
@@ -65,6 +67,16 @@ public:
         for (const Part& part : list)
             part(*this);
     }
+
+    /// A few short records as the sink writes them, to be written many times.
+    struct EncodedRecords {
+        std::string bytes;
+        std::vector<std::uint32_t> places; ///< of records in the bytes, where their position matters
+    };
+    /// The records that the part writes, encoded for the sink's current level. The part succeeds.
+    [[nodiscard]] virtual EncodedRecords encoded(const Part& part) const = 0;
+    /// Writes them at the level that they were encoded for.
+    virtual void repeat(const EncodedRecords& records) = 0;
 
     /// A heading between top-level records, for human readers.
     virtual void heading(std::string_view) {}

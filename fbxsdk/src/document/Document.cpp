@@ -3,6 +3,9 @@
 #include "document/Document.h"
 
 #include <algorithm>
+#include <utility>
+
+#include "document/WrittenLines.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -23,6 +26,13 @@ std::span<const Value> Document::keep(std::initializer_list<Value> values) {
     const std::span<Value> kept = tree->newValues(values.size());
     std::copy(values.begin(), values.end(), kept.begin());
     return kept;
+}
+
+void Document::settleProperties(DocumentObject& object) const {
+    WrittenLines lines;
+    lines.fill(object);
+    object.properties = lines.kept(*tree);
+    object.content->properties = nullptr;
 }
 
 } // namespace detail

@@ -22,6 +22,7 @@ FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
 class RecordSink;
+class WrittenLines;
 struct VersionTraits;
 
 /// Ticks of one second in all later stages, whatever unit the file counts in.
@@ -36,6 +37,8 @@ struct DocumentProperty {
     std::span<const Value> values; ///< times (type "KTime") are already in ticks of kTicksPerSecond
 };
 
+/// Adds an object's lines in file order. Called while the document is written, so that those of one object exist.
+using AddLines = std::function<void(WrittenLines& lines)>;
 /// Writes some of an object's records. Called while the document is written, so that one large array exists at a time.
 using WriteRecords = std::function<void(RecordSink& sink, const VersionTraits& traits)>;
 using UseKeys = std::function<void(const CurveKeys& keys)>;
@@ -45,6 +48,8 @@ struct ObjectContent {
     std::string_view nameClass; ///< the part before "::" in its name
     /// The class whose template holds the defaults; empty for a class without one.
     std::string_view templateClass;
+    /// From 7.x on those that differ from the defaults, before that all of them; behind DocumentObject::properties.
+    AddLines properties;
     WriteRecords before; ///< the records before the properties …
     WriteRecords after;  ///< … and after them; either may be empty
     /// Of a curve: returns its keys, with tangents that the version supports.
@@ -53,11 +58,11 @@ struct ObjectContent {
 
 /// One object. Names and spellings are those of the 7.x generation.
 struct DocumentObject {
-    std::int64_t id = 0;
+    std::int64_t id = 0;       ///< to be written: small, from a counter
     std::string_view record;   ///< "Model", "NodeAttribute", "Geometry", "Deformer", "Material", "AnimationCurve", …
     std::string_view subClass; ///< "Mesh", "Camera", "LimbNode", "Skin", "Cluster", … may be empty
     std::string_view name;     ///< without the class prefix; may be empty; bytes as in the file
-    /// To be written: from 7.x on those that differ from the defaults, before that all of them.
+    /// To be written: those that are known in advance, usually none.
     std::vector<DocumentProperty> properties;
     /// The object's sub-records in 7.x spelling (Vertices, LayerElementNormal, Shading, Indexes, …). Never null in a
     /// document that was read.
@@ -132,9 +137,11 @@ struct Document {
     [[nodiscard]] const DocumentObject* find(std::int64_t objectId) const;
     /// Stores values for a property.
     [[nodiscard]] std::span<const Value> keep(std::initializer_list<Value> values);
+    /// Stores the lines of an object that is to be written; from now on its list has all of them.
+    void settleProperties(DocumentObject& object) const;
 
     std::vector<std::pair<std::int64_t, std::uint32_t>> idIndex; ///< sorted; filled by readDocument
-    mutable std::unique_ptr<DocumentCompanion> companion; ///< of geometry; the last member, since it refers to others
+    mutable std::unique_ptr<DocumentCompanion> companion;        ///< the last member, since it refers to others
 };
 
 /// Reads a file of any generation. Null on failure; the status then names the file, the place and the fault.

@@ -13,6 +13,8 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
+struct WrittenLine;
+
 /// FBXHeaderExtension, and in binary files the file's id, time and creator.
 void writeHeader(const Document& document, const VersionTraits& traits, RecordSink& sink);
 /// What the header of 7.x files and an object of older ones state about the scene's origin.
@@ -45,6 +47,8 @@ void writeLegacyCurve(RecordSink& sink, const VersionTraits& traits, const Curve
 
 /// `Properties70 { P: name, type, subtype, flags, values }`.
 void writeProperties70(RecordSink& sink, std::span<const DocumentProperty> properties);
+/// The same for an object's lines; nothing when there are none.
+void writeLines70(RecordSink& sink, std::span<const WrittenLine> lines);
 /// `Property: name, type, flags, values` as lines of `Properties60`.
 void writeProperty60(RecordSink& sink, const DocumentProperty& property, std::string_view flags);
 

@@ -7,6 +7,7 @@
 
 #include "document/DocumentSections.h"
 #include "document/RecordWriting.h"
+#include "document/WrittenLines.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -74,7 +75,7 @@ void writeDefinitions(const Document& document, RecordSink& sink) {
         writeObjectType(document, kind, sink);
 }
 
-void writeObject(const DocumentObject& object, const VersionTraits& traits, RecordSink& sink) {
+void writeObject(const DocumentObject& object, WrittenLines& lines, const VersionTraits& traits, RecordSink& sink) {
     sink.beginRecord(object.record);
     sink.longInteger(object.id);
     sink.objectName(object.content->nameClass, object.name);
@@ -82,8 +83,8 @@ void writeObject(const DocumentObject& object, const VersionTraits& traits, Reco
     sink.beginBlock();
     if (object.content->before)
         object.content->before(sink, traits);
-    if (!object.properties.empty())
-        writeProperties70(sink, object.properties);
+    lines.fill(object);
+    writeLines70(sink, lines.all());
     if (object.content->curve)
         object.content->curve(traits, [&](const CurveKeys& keys) { writeCurve(sink, traits, keys); });
     if (object.content->after)
@@ -94,10 +95,11 @@ void writeObject(const DocumentObject& object, const VersionTraits& traits, Reco
 void writeObjects(const Document& document, const VersionTraits& traits, RecordSink& sink) {
     sink.heading("Object properties");
     const BlockScope block(sink, "Objects");
+    WrittenLines lines;
     for (const DocumentObject& object : document.objects) {
         if (sink.failed())
             return;
-        writeObject(object, traits, sink);
+        writeObject(object, lines, traits, sink);
     }
 }
 

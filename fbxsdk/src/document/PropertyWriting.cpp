@@ -9,6 +9,7 @@
 
 #include "container/NumberConversion.h"
 #include "document/RecordWriting.h"
+#include "document/WrittenLines.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -79,17 +80,28 @@ void writeValues(RecordSink& sink, const DocumentProperty& property) {
         writeValue(sink, value, storage);
 }
 
+void writeLine70(RecordSink& sink, const DocumentProperty& property) {
+    sink.beginRecord("P");
+    for (const std::string_view text : {property.name, property.typeName, property.subTypeName, property.flags})
+        sink.text(text);
+    writeValues(sink, property);
+    sink.endRecord();
+}
+
 } // namespace
 
 void writeProperties70(RecordSink& sink, std::span<const DocumentProperty> properties) {
     const BlockScope block(sink, "Properties70");
-    for (const DocumentProperty& property : properties) {
-        sink.beginRecord("P");
-        for (const std::string_view text : {property.name, property.typeName, property.subTypeName, property.flags})
-            sink.text(text);
-        writeValues(sink, property);
-        sink.endRecord();
-    }
+    for (const DocumentProperty& property : properties)
+        writeLine70(sink, property);
+}
+
+void writeLines70(RecordSink& sink, std::span<const WrittenLine> lines) {
+    if (lines.empty())
+        return;
+    const BlockScope block(sink, "Properties70");
+    for (const WrittenLine& line : lines)
+        writeLine70(sink, *line.property);
 }
 
 void writeProperty60(RecordSink& sink, const DocumentProperty& property, std::string_view flags) {

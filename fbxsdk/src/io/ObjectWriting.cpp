@@ -28,6 +28,7 @@
 
 #include "animation/CurveEvaluation.h"
 #include "document/RecordWriting.h"
+#include "document/WrittenLines.h"
 #include "geometry/GeometryWriting.h"
 #include "object/SceneMembers.h"
 #include "schema/Spellings.h"
@@ -48,18 +49,16 @@ std::string_view writtenSubClass(const FbxObject& object, const SchemaClass& sch
 struct Writing {
     DocumentObject& target;
     FbxObject& object;
-    const VersionTraits& traits;
-    RecordTree& texts;
 
     template <class T>
     [[nodiscard]] T& as() const {
         return static_cast<T&>(object);
     }
-    void set(std::string_view name, const FbxDataType& type, std::string_view flags, const Value& value) const {
-        setProperty(target.properties,
-                    {name, type.info()->typeName, type.info()->subTypeName, flags, keepValue(texts, value)});
-    }
 };
+
+void setLine(WrittenLines& lines, std::string_view name, const FbxDataType& type, const Value& value) {
+    lines.set({name, type.info()->typeName, type.info()->subTypeName, "", lines.keep(value)});
+}
 
 WriteRecords versionRecord(int version) {
     return [version](RecordSink& sink, const VersionTraits&) { writeInteger(sink, "Version", version); };
@@ -76,7 +75,6 @@ void writeNode(const Writing& writing) {
     constexpr int kVersion = 232;
     auto& node = writing.as<FbxNode>();
     writing.target.subClass = kindOf(node);
-    writing.set("DefaultAttributeIndex", FbxIntDT, "", Value::ofInteger(node.GetNodeAttribute() ? 0 : -1));
     writing.target.content->before = versionRecord(kVersion);
     const bool hidden = node.GetNodeAttribute() && isView(*node.GetNodeAttribute());
     writing.target.content->after = [&node, hidden](RecordSink& sink, const VersionTraits& traits) {
@@ -89,6 +87,11 @@ void writeNode(const Writing& writing) {
         writeLetter(sink, "Shading", spellingOf(kShadingModes, node.GetShadingMode(), FbxNode::eHardShading));
         writeText(sink, "Culling", "CullingOff");
     };
+}
+
+void addNodeLines(FbxObject& node, const ClassOutput&, WrittenLines& lines) {
+    const bool hasAttribute = static_cast<FbxNode&>(node).GetNodeAttribute() != nullptr;
+    setLine(lines, "DefaultAttributeIndex", FbxIntDT, Value::ofInteger(hasAttribute ? 0 : -1));
 }
 
 void writeVector(RecordSink& sink, std::string_view name, const FbxDouble3& vector) {
@@ -164,19 +167,19 @@ std::string shadingModelOf(const FbxSurfaceMaterial& material) {
 
 void writeMaterial(const Writing& writing) {
     auto& material = writing.as<FbxSurfaceMaterial>();
-    if (writing.traits.defaultsLeftOut) {
-        // The record's content need not be repeated. Older files list all properties.
-        const std::string model = shadingModelOf(material);
-        std::erase_if(writing.target.properties, [&](const DocumentProperty& property) {
-            return property.name == "ShadingModel" && property.values.size() == 1 &&
-                   property.values.front().toText() == model;
-        });
-    }
     writing.target.content->before = [&material](RecordSink& sink, const VersionTraits&) {
         writeInteger(sink, "Version", 102);
         writeText(sink, "ShadingModel", shadingModelOf(material));
         writeInteger(sink, "MultiLayer", material.MultiLayer.Get() ? 1 : 0);
     };
+}
+
+/// The record's content need not be repeated. Older files list all properties.
+void omitShadingModel(FbxObject& object, const ClassOutput& common, WrittenLines& lines) {
+    constexpr std::string_view kName = "ShadingModel";
+    const WrittenLine* const line = common.choice == PropertyChoice::changed ? lines.find(kName) : nullptr;
+    if (line && line->value().toText() == shadingModelOf(static_cast<FbxSurfaceMaterial&>(object)))
+        lines.remove(kName);
 }
 
 void writeTextureName(RecordSink& sink, std::string_view record, std::string_view className, const FbxObject* object) {
@@ -226,8 +229,8 @@ void writeVideo(const Writing& writing) {
 
 void writeVersion100(const Writing& writing) { writing.target.content->before = versionRecord(100); }
 
-void writeStack(const Writing& writing) {
-    auto& stack = writing.as<FbxAnimStack>();
+void addStackLines(FbxObject& object, const ClassOutput&, WrittenLines& lines) {
+    auto& stack = static_cast<FbxAnimStack&>(object);
     const WrittenSpan local = writtenSpan(stack.GetLocalTimeSpan(), stack);
     const WrittenSpan reference = writtenSpan(stack.GetReferenceTimeSpan(), stack);
     const std::pair<std::string_view, std::int64_t> times[] = {{"LocalStart", local.start},
@@ -235,28 +238,24 @@ void writeStack(const Writing& writing) {
                                                                {"ReferenceStart", reference.start},
                                                                {"ReferenceStop", reference.stop}};
     // All four, in this order, also where the stack itself holds only some that differ from the defaults.
-    std::vector<DocumentProperty>& properties = writing.target.properties;
     for (const auto& [name, time] : times)
-        std::erase_if(properties, [name = name](const DocumentProperty& property) { return property.name == name; });
+        lines.remove(name);
     for (const auto& [name, time] : times)
-        writing.set(name, FbxTimeDT, "", Value::ofInteger(time));
+        setLine(lines, name, FbxTimeDT, Value::ofInteger(time));
 }
 
 /// The property that a curve node drives; invalid when it drives none.
 FbxProperty drivenProperty(const FbxAnimCurveNode& node) { return node.GetDstProperty(0); }
 
 /// A curve node's channels are its properties: "d|X", … or "d|" and the name of the property that it drives.
-void writeCurveNode(const Writing& writing) {
-    auto& node = writing.as<FbxAnimCurveNode>();
+void addChannelLines(FbxObject& object, const ClassOutput& common, WrittenLines& lines) {
+    auto& node = static_cast<FbxAnimCurveNode&>(object);
     const FbxProperty driven = drivenProperty(node);
     const bool single = node.GetChannelsCount() == 1 && driven.IsValid();
     const std::string_view typeName = single ? channelTypeName(driven.GetPropertyDataType()) : "Number";
-    for (unsigned int i = 0; i < node.GetChannelsCount(); ++i) {
-        std::string name("d|");
-        name += node.GetChannelName(static_cast<int>(i)).Buffer();
-        writing.target.properties.push_back({writing.texts.keepText(std::move(name)), typeName, "", "A",
-                                             keepValue(writing.texts, Value::ofReal(node.channelValue(i)))});
-    }
+    for (unsigned int i = 0; i < node.GetChannelsCount(); ++i)
+        lines.add({common.texts.channel(node.GetChannelName(static_cast<int>(i)).Buffer()), typeName, "", "A",
+                   lines.keep(Value::ofReal(node.channelValue(i)))});
 }
 
 void writeCurveKeys(const Writing& writing) {
@@ -287,16 +286,20 @@ void writeAnyDeformer(const Writing& writing) {
     };
 }
 
-using WriteFunction = void (*)(const Writing&);
+} // namespace
 
 /// The first row whose class the object has applies.
 struct ClassWriter {
     const FbxClassId& id;
-    WriteFunction write;
+    void (*write)(const Writing& writing) = nullptr;
+    /// Changes the lines of the object's properties.
+    void (*addLines)(FbxObject& object, const ClassOutput& common, WrittenLines& lines) = nullptr;
 };
 
+namespace {
+
 const ClassWriter kWriters[] = {
-    {FbxNode::ClassId, writeNode},
+    {FbxNode::ClassId, writeNode, addNodeLines},
     {FbxCameraStereo::ClassId, writeCameraStereo},
     {FbxCamera::ClassId, writeCamera},
     {FbxCameraSwitcher::ClassId, writeCameraSwitcher},
@@ -308,14 +311,20 @@ const ClassWriter kWriters[] = {
     {FbxDeformer::ClassId, writeAnyDeformer},
     {FbxSubDeformer::ClassId, writeAnyDeformer},
     {FbxCache::ClassId, writeVersion100},
-    {FbxSurfaceMaterial::ClassId, writeMaterial},
+    {FbxSurfaceMaterial::ClassId, writeMaterial, omitShadingModel},
     {FbxFileTexture::ClassId, writeFileTexture},
     {FbxLayeredTexture::ClassId, writeLayeredTexture},
     {FbxVideo::ClassId, writeVideo},
-    {FbxAnimStack::ClassId, writeStack},
-    {FbxAnimCurveNode::ClassId, writeCurveNode},
+    {FbxAnimStack::ClassId, nullptr, addStackLines},
+    {FbxAnimCurveNode::ClassId, nullptr, addChannelLines},
     {FbxAnimCurve::ClassId, writeCurveKeys},
 };
+
+const ClassWriter* findWriter(const FbxClassId& id) {
+    const auto* const found =
+        std::find_if(std::begin(kWriters), std::end(kWriters), [&](const ClassWriter& each) { return id.Is(each.id); });
+    return found == std::end(kWriters) ? nullptr : found;
+}
 
 /// Widens the span by that of a curve node.
 void widen(FbxTimeSpan& span, bool& found, const FbxAnimCurveNode& node) {
@@ -342,23 +351,30 @@ bool isView(const FbxNodeAttribute& attribute) {
     return listed;
 }
 
-DocumentObject writableObject(FbxObject& object, const SchemaClass& schema, const VersionTraits& traits,
-                              RecordTree& texts) {
+const ClassOutput& ClassOutputs::of(const FbxObject& object, const SchemaClass& schema) {
+    const ClassInfo* const info = object.data().info;
+    const auto known = mClasses.find(info);
+    if (known != mClasses.end())
+        return known->second;
+    const ClassOutput made{schema, findWriter(object.GetClassId()), defaultsOf(info->rows), mChoice, mTexts};
+    return mClasses.emplace(info, made).first->second;
+}
+
+DocumentObject writableObject(FbxObject& object, const ClassOutput& common) {
     DocumentObject target;
     target.content = std::make_unique<ObjectContent>();
-    target.record = schema.record;
-    target.content->nameClass = schema.nameClass;
-    target.subClass = writtenSubClass(object, schema);
+    target.record = common.schema.record;
+    target.content->nameClass = common.schema.nameClass;
+    target.subClass = writtenSubClass(object, common.schema);
     target.name = object.data().name;
-    target.content->templateClass = schema.templateName();
-    const PropertyChoice choice = traits.defaultsLeftOut ? PropertyChoice::changed : PropertyChoice::all;
-    target.properties = writableProperties(object, choice, texts);
-    for (const ClassWriter& writer : kWriters) {
-        if (object.GetClassId().Is(writer.id)) {
-            writer.write({target, object, traits, texts});
-            break;
-        }
-    }
+    target.content->templateClass = common.schema.templateName();
+    target.content->properties = [&object, &common](WrittenLines& lines) {
+        addLines(object, common.choice, common.defaults, common.texts, lines);
+        if (common.writer && common.writer->addLines)
+            common.writer->addLines(object, common, lines);
+    };
+    if (common.writer && common.writer->write)
+        common.writer->write({target, object});
     return target;
 }
 

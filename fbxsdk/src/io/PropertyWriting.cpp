@@ -10,6 +10,7 @@
 
 #include <fbxsdk/FbxAnimCurveNode.h>
 
+#include "document/WrittenLines.h"
 #include "scene/IdleCurveNode.h"
 #include "schema/PropertyFlags.h"
 #include "schema/PropertyTypes.h"
@@ -69,7 +70,8 @@ unsigned flagsWith(unsigned flags, bool animated) {
     return animated ? flags | kAnimated : flags & ~static_cast<unsigned>(FbxPropertyFlags::eAnimated);
 }
 
-std::span<const Value> valuesOf(const FbxDataType& type, const PropertyValue& value, RecordTree& texts) {
+/// The texts stay where they are.
+std::span<const Value> valuesOf(const FbxDataType& type, const PropertyValue& value, WrittenLines& lines) {
     switch (type.GetType()) {
     case eFbxUndefined:
     case eFbxReference:
@@ -77,46 +79,33 @@ std::span<const Value> valuesOf(const FbxDataType& type, const PropertyValue& va
         return {};
     case eFbxString:
     case eFbxDateTime:
-        return keepValue(texts, Value::ofText(texts.keepText(value.text)));
+        return lines.keep(Value::ofText(value.text));
     case eFbxFloat:
     case eFbxDouble:
     case eFbxDouble2:
     case eFbxDouble3:
     case eFbxDouble4:
     case eFbxHalfFloat:
-    case eFbxDistance: {
-        const std::span<Value> kept = texts.newValues(componentCount(type.GetType()));
-        std::transform(value.numbers.begin(), value.numbers.begin() + static_cast<std::ptrdiff_t>(kept.size()),
-                       kept.begin(), Value::ofReal);
-        return kept;
-    }
+    case eFbxDistance:
+        return lines.keepReals(std::span(value.numbers).first(componentCount(type.GetType())));
     default:
-        return keepValue(texts, Value::ofInteger(value.integer));
+        return lines.keep(Value::ofInteger(value.integer));
     }
 }
 
-DocumentProperty line(std::string_view name, const FbxDataType& type, const PropertyValue& value, std::string flags,
-                      RecordTree& texts) {
-    return {name, type.info()->typeName, type.info()->subTypeName, texts.keepText(std::move(flags)),
-            valuesOf(type, value, texts)};
-}
-
-DocumentProperty defaultLine(const PropertyRow& row, RecordTree& texts) {
-    return line(row.name, *row.type, defaultValue(row), row.flags, texts);
-}
-
-DocumentProperty writableLine(const PropertyData& data, RecordTree& texts) {
+DocumentProperty writableLine(const PropertyData& data, std::string_view name, CommonTexts& texts,
+                              WrittenLines& lines) {
     const bool animated = isAnimated(data);
-    DocumentProperty property = line(data.row ? std::string_view(data.row->name) : std::string_view(data.name),
-                                     data.type, data.value, propertyFlagText(flagsWith(data.flags, animated)), texts);
+    DocumentProperty property{name, data.type.info()->typeName, data.type.info()->subTypeName,
+                              texts.flags(flagsWith(data.flags, animated)), valuesOf(data.type, data.value, lines)};
     spellType(property, animated || (data.flags & FbxPropertyFlags::eAnimatable) != 0);
     return property;
 }
 
-bool sameValue(const PropertyValue& a, const PropertyValue& b, EFbxType type) {
+bool hasDefault(const PropertyValue& value, const PropertyRow& row, EFbxType type) {
     if (type == eFbxString || type == eFbxDateTime)
-        return a.text == b.text;
-    return a.numbers == b.numbers && a.integer == b.integer;
+        return value.text == row.text;
+    return value.numbers == row.numbers && value.integer == static_cast<std::int64_t>(row.numbers[0]);
 }
 
 /// Connections count too: a reference holds nothing but its connection.
@@ -124,37 +113,67 @@ bool isChanged(const PropertyData& data) {
     if (!data.row || isConnected(data))
         return true;
     constexpr unsigned kWritten = ~static_cast<unsigned>(FbxPropertyFlags::eImported | FbxPropertyFlags::eAnimated);
-    return !sameValue(data.value, defaultValue(*data.row), data.type.GetType()) ||
+    return !hasDefault(data.value, *data.row, data.type.GetType()) ||
            (data.flags & kWritten) != (defaultFlags(*data.row) & kWritten);
 }
 
 } // namespace
 
-std::vector<DocumentProperty> writableProperties(const FbxObject& object, PropertyChoice choice, RecordTree& texts) {
-    std::vector<DocumentProperty> lines;
-    const ObjectData& data = object.data();
-    const std::span<const PropertyRow> rows = data.info->rows;
-    auto next = data.properties().begin();
-    for (int index = 0; index < data.propertyCount(); ++index) {
-        if (next == data.properties().end() && choice == PropertyChoice::changed)
-            break;
-        const bool stored = next != data.properties().end() && (*next)->index == index;
-        const PropertyData* property = stored ? *next++ : nullptr;
-        if (property && (property->flags & FbxPropertyFlags::eNotSavable) != 0)
-            continue;
-        if (property && (choice == PropertyChoice::all || isChanged(*property)))
-            lines.push_back(writableLine(*property, texts));
-        else if (choice == PropertyChoice::all && static_cast<std::size_t>(index) < rows.size())
-            lines.push_back(defaultLine(rows[static_cast<std::size_t>(index)], texts));
-    }
-    return lines;
+std::string_view CommonTexts::flags(unsigned flags) {
+    const auto [text, isNew] = mFlags.try_emplace(flags);
+    if (isNew)
+        text->second = mTree.keepText(propertyFlagText(flags));
+    return text->second;
 }
 
-std::vector<DocumentProperty> templateProperties(std::span<const PropertyRow> rows, RecordTree& texts) {
-    std::vector<DocumentProperty> lines;
-    for (const PropertyRow& row : rows)
-        lines.push_back(defaultLine(row, texts));
-    return lines;
+std::string_view CommonTexts::channel(std::string_view name) {
+    constexpr std::string_view kPrefix = "d|";
+    if (const auto known = mChannels.find(name); known != mChannels.end())
+        return known->second;
+    const std::string_view text = mTree.keepText(std::string(kPrefix).append(name));
+    mChannels.emplace(text.substr(kPrefix.size()), text);
+    return text;
+}
+
+const DefaultLines& ClassOutputs::defaultsOf(std::span<const PropertyRow> rows) {
+    const auto [known, isNew] = mDefaults.try_emplace(rows.data());
+    DefaultLines& defaults = known->second;
+    if (!isNew)
+        return defaults;
+    defaults.firstNumber = mNextNumber;
+    mNextNumber += static_cast<int>(rows.size());
+    WrittenLines values;
+    for (const PropertyRow& row : rows) {
+        const FbxDataType& type = *row.type;
+        const PropertyValue value = defaultValue(row);
+        std::span<const Value> stored = valuesOf(type, value, values);
+        if (!stored.empty() && stored[0].type == Value::Type::text)
+            stored = values.keep(Value::ofText(row.text));
+        values.add({row.name, type.info()->typeName, type.info()->subTypeName, row.flags, stored});
+    }
+    defaults.lines = values.kept(mTree);
+    return defaults;
+}
+
+void addLines(const FbxObject& object, PropertyChoice choice, const DefaultLines& defaults, CommonTexts& texts,
+              WrittenLines& lines) {
+    const ObjectData& data = object.data();
+    const int rowCount = static_cast<int>(data.info->rows.size());
+    auto next = data.properties().begin();
+    const auto end = data.properties().end();
+    for (int index = 0; next != end || (choice == PropertyChoice::all && index < rowCount); ++index) {
+        if (choice == PropertyChoice::changed)
+            index = (*next)->index;
+        const bool isStored = next != end && (*next)->index == index;
+        const PropertyData* const property = isStored ? *next++ : nullptr;
+        const DocumentProperty* const line =
+            index < rowCount ? &defaults.lines[static_cast<std::size_t>(index)] : nullptr;
+        if (!property)
+            lines.refer(*line, defaults.firstNumber + index);
+        else if ((property->flags & FbxPropertyFlags::eNotSavable) == 0 &&
+                 (choice == PropertyChoice::all || isChanged(*property)))
+            lines.add(writableLine(*property, line ? line->name : std::string_view(property->name), texts, lines));
+    }
 }
 
 std::string_view propertyName(const FbxObject& object, int index) {
@@ -162,21 +181,6 @@ std::string_view propertyName(const FbxObject& object, int index) {
     if (static_cast<std::size_t>(index) < rows.size())
         return rows[static_cast<std::size_t>(index)].name;
     return object.data().property(index)->name;
-}
-
-void setProperty(std::vector<DocumentProperty>& properties, const DocumentProperty& line) {
-    const auto found = std::find_if(properties.begin(), properties.end(),
-                                    [&](const DocumentProperty& each) { return each.name == line.name; });
-    if (found == properties.end())
-        properties.push_back(line);
-    else
-        found->values = line.values;
-}
-
-std::span<const Value> keepValue(RecordTree& texts, const Value& value) {
-    const std::span<Value> kept = texts.newValues(1);
-    kept[0] = value;
-    return kept;
 }
 
 std::string_view channelTypeName(const FbxDataType& type) {

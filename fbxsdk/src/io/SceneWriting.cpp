@@ -5,6 +5,8 @@
 #include "io/SceneWriting.h"
 
 #include <algorithm>
+#include <array>
+#include <memory>
 #include <unordered_map>
 #include <unordered_set>
 
@@ -17,6 +19,7 @@
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
 
+#include "document/WrittenLines.h"
 #include "object/SceneMembers.h"
 #include "scene/IdleCurveNode.h"
 #include "scene/SceneData.h"
@@ -96,7 +99,7 @@ private:
 class ConnectionWriter {
 public:
     ConnectionWriter(FbxScene& scene, const std::unordered_map<const FbxObject*, std::int64_t>& ids,
-                     std::vector<DocumentConnection>& connections, RecordTree& texts)
+                     std::vector<DocumentConnection>& connections, CommonTexts& texts)
         : mScene(scene), mIds(ids), mConnections(connections), mTexts(texts) {}
 
     void write(const std::vector<ChosenObject>& objects) {
@@ -106,14 +109,12 @@ public:
                 add(kHierarchy, idOf(*source->object), 0);
         for (const ChosenObject& chosen : objects)
             writeSources(*chosen.object);
-        std::stable_sort(mRanked.begin(), mRanked.end(),
-                         [](const auto& a, const auto& b) { return a.first < b.first; });
-        for (const auto& [rank, connection] : mRanked)
-            mConnections.push_back(connection);
+        for (const std::vector<DocumentConnection>& connections : mRanked)
+            mConnections.insert(mConnections.end(), connections.begin(), connections.end());
     }
 
 private:
-    enum Rank { kHierarchy, kLayers, kLayerMembers, kOthers, kCurves };
+    enum Rank { kHierarchy, kLayers, kLayerMembers, kOthers, kCurves, kRanks };
 
     /// 0 for objects that are not in the file.
     [[nodiscard]] std::int64_t idOf(const FbxObject& object) const {
@@ -124,7 +125,7 @@ private:
     void add(Rank rank, std::int64_t source, std::int64_t destination, std::string_view sourceProperty = {},
              std::string_view destinationProperty = {}) {
         if (source != 0)
-            mRanked.push_back({rank, {source, destination, sourceProperty, destinationProperty}});
+            mRanked[rank].push_back({source, destination, sourceProperty, destinationProperty});
     }
 
     void writeSources(const FbxObject& destination) {
@@ -143,10 +144,8 @@ private:
         for (unsigned int channel = 0; channel < node.GetChannelsCount(); ++channel) {
             const int count = node.GetCurveCount(channel);
             for (int i = 0; i < count; ++i) {
-                std::string name("d|");
-                name += node.GetChannelName(static_cast<int>(channel)).Buffer();
                 add(kCurves, idOf(*node.GetCurve(channel, static_cast<unsigned int>(i))), id, {},
-                    mTexts.keepText(std::move(name)));
+                    mTexts.channel(node.GetChannelName(static_cast<int>(channel)).Buffer()));
             }
         }
     }
@@ -167,15 +166,17 @@ private:
     FbxScene& mScene;
     const std::unordered_map<const FbxObject*, std::int64_t>& mIds;
     std::vector<DocumentConnection>& mConnections;
-    RecordTree& mTexts;
-    std::vector<std::pair<Rank, DocumentConnection>> mRanked;
+    CommonTexts& mTexts;
+    std::array<std::vector<DocumentConnection>, kRanks> mRanked;
 };
 
-void writeSettings(FbxScene& scene, Document& document) {
-    document.globalSettings = writableProperties(scene.GetGlobalSettings(), PropertyChoice::all, *document.tree);
+void writeSettings(FbxScene& scene, ClassOutputs& classes, Document& document) {
+    const FbxGlobalSettings& settings = scene.GetGlobalSettings();
+    WrittenLines lines;
+    addLines(settings, PropertyChoice::all, classes.defaultsOf(settings.data().info->rows), classes.texts(), lines);
     const char* const camera = scene.GlobalCameraSettings().GetDefaultCamera();
-    setProperty(document.globalSettings,
-                {"DefaultCamera", "KString", "", "", keepValue(*document.tree, Value::ofText(camera))});
+    lines.set({"DefaultCamera", "KString", "", "", lines.keep(Value::ofText(camera))});
+    document.globalSettings = lines.kept(*document.tree);
 
     const FbxGlobalLightSettings& lights = scene.GlobalLightSettings();
     DocumentLightSettings& target = document.lightSettings;
@@ -194,12 +195,12 @@ void writeSettings(FbxScene& scene, Document& document) {
     target.fogEnd = lights.GetFogEnd();
 }
 
-void writeTemplates(const std::vector<ChosenObject>& objects, Document& document) {
+void writeTemplates(const std::vector<ChosenObject>& objects, ClassOutputs& classes, Document& document) {
     std::unordered_set<const SchemaClass*> done;
     for (const ChosenObject& chosen : objects) {
         if (done.insert(chosen.schema).second)
-            document.templates.push_back({chosen.schema->record, chosen.schema->templateName(),
-                                          templateProperties(chosen.schema->rows, *document.tree)});
+            document.templates.push_back(
+                {chosen.schema->record, chosen.schema->templateName(), classes.defaultsOf(chosen.schema->rows).lines});
     }
 }
 
@@ -226,18 +227,23 @@ void writeTakes(const std::vector<ChosenObject>& objects, Document& document) {
 void writeScene(FbxScene& scene, const VersionTraits& traits, Document& document) {
     const std::vector<ChosenObject> objects = ObjectChoice(scene, traits).choose();
     std::unordered_map<const FbxObject*, std::int64_t> ids;
+    ids.reserve(objects.size());
     std::int64_t lastId = 0;
     document.id = ++lastId;
     for (const ChosenObject& chosen : objects)
         ids.emplace(chosen.object, ++lastId);
     document.activeStackName = scene.ActiveAnimStackName.Get().Buffer();
-    writeSettings(scene, document);
-    writeTemplates(objects, document);
+    auto owned = std::make_unique<ClassOutputs>(*document.tree, traits);
+    ClassOutputs& classes = *owned;
+    document.companion = std::move(owned); // the objects refer to it
+    writeSettings(scene, classes, document);
+    writeTemplates(objects, classes, document);
+    document.objects.reserve(objects.size());
     for (const ChosenObject& chosen : objects) {
-        document.objects.push_back(writableObject(*chosen.object, *chosen.schema, traits, *document.tree));
+        document.objects.push_back(writableObject(*chosen.object, classes.of(*chosen.object, *chosen.schema)));
         document.objects.back().id = ids.at(chosen.object);
     }
-    ConnectionWriter(scene, ids, document.connections, *document.tree).write(objects);
+    ConnectionWriter(scene, ids, document.connections, classes.texts()).write(objects);
     writeTakes(objects, document);
 }
 

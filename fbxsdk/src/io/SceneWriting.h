@@ -4,11 +4,15 @@
 // Converts a scene to a document to be written: the inverse of SceneReading.
 #pragma once
 
+#include <span>
+#include <string_view>
+#include <unordered_map>
 #include <vector>
 
 #include "document/Document.h"
 #include "io/SchemaClass.h"
 #include "object/ObjectData.h"
+#include "schema/VersionTraits.h"
 
 FBXSDK_NAMESPACE_BEGIN
 
@@ -26,9 +30,65 @@ void writeScene(FbxScene& scene, const VersionTraits& traits, Document& document
 /// that are unparented.
 [[nodiscard]] bool isView(const FbxNodeAttribute& attribute);
 
-/// Everything about the object except its id. Its large arrays are fetched when they are written.
-[[nodiscard]] DocumentObject writableObject(FbxObject& object, const SchemaClass& schema, const VersionTraits& traits,
-                                            RecordTree& texts);
+/// Which properties of an object are written.
+enum class PropertyChoice {
+    changed, ///< those that differ from their class's defaults, or are connected
+    all
+};
+
+/// The lines of a class's properties as long as they have their defaults, as its template holds them.
+struct DefaultLines {
+    std::vector<DocumentProperty> lines;
+    int firstNumber = 0; ///< of these lines among those of all classes
+};
+
+/// Texts that many lines have, stored once in the document.
+class CommonTexts {
+public:
+    explicit CommonTexts(RecordTree& tree) : mTree(tree) {}
+    /// How files spell the flags of a property.
+    [[nodiscard]] std::string_view flags(unsigned flags);
+    /// The name of a curve node's channel in files.
+    [[nodiscard]] std::string_view channel(std::string_view name);
+
+private:
+    RecordTree& mTree;
+    std::unordered_map<unsigned, std::string_view> mFlags;
+    std::unordered_map<std::string_view, std::string_view> mChannels;
+};
+
+struct ClassWriter;
+
+/// What all objects of one class of a scene that is written have in common.
+struct ClassOutput {
+    const SchemaClass& schema;
+    const ClassWriter* writer; ///< null for a class that is only properties
+    const DefaultLines& defaults;
+    PropertyChoice choice;
+    CommonTexts& texts;
+};
+
+/// The classes of a scene that is written.
+class ClassOutputs final : public DocumentCompanion {
+public:
+    ClassOutputs(RecordTree& tree, const VersionTraits& traits)
+        : mTree(tree), mTexts(tree), mChoice(traits.defaultsLeftOut ? PropertyChoice::changed : PropertyChoice::all) {}
+
+    [[nodiscard]] const ClassOutput& of(const FbxObject& object, const SchemaClass& schema);
+    [[nodiscard]] const DefaultLines& defaultsOf(std::span<const PropertyRow> rows);
+    [[nodiscard]] CommonTexts& texts() { return mTexts; }
+
+private:
+    RecordTree& mTree;
+    CommonTexts mTexts;
+    PropertyChoice mChoice;
+    int mNextNumber = 0;
+    std::unordered_map<const PropertyRow*, DefaultLines> mDefaults;
+    std::unordered_map<const ClassInfo*, ClassOutput> mClasses;
+};
+
+/// Everything about the object except its id. Its properties and large arrays are fetched when they are written.
+[[nodiscard]] DocumentObject writableObject(FbxObject& object, const ClassOutput& common);
 
 /// The start and end that files state for a span: where it is empty, as it is when not set, those of the keys.
 struct WrittenSpan {
@@ -36,28 +96,13 @@ struct WrittenSpan {
 };
 [[nodiscard]] WrittenSpan writtenSpan(const FbxTimeSpan& span, const FbxAnimStack& stack);
 
-/// Which properties of an object are written.
-enum class PropertyChoice {
-    changed, ///< those that differ from their class's defaults, or are connected
-    all
-};
-
-/// The lines in file order: those of the class, then the dynamic ones. Properties that are not to be saved are
+/// Adds the lines in file order: those of the class, then the dynamic ones. Properties that are not to be saved are
 /// omitted.
-[[nodiscard]] std::vector<DocumentProperty> writableProperties(const FbxObject& object, PropertyChoice choice,
-                                                               RecordTree& texts);
-
-/// The defaults of a class, as its template holds them.
-[[nodiscard]] std::vector<DocumentProperty> templateProperties(std::span<const PropertyRow> rows, RecordTree& texts);
+void addLines(const FbxObject& object, PropertyChoice choice, const DefaultLines& defaults, CommonTexts& texts,
+              WrittenLines& lines);
 
 /// The name by which connections refer to a property.
 [[nodiscard]] std::string_view propertyName(const FbxObject& object, int index);
-
-/// Replaces the values of the line of that name, or appends the line.
-void setProperty(std::vector<DocumentProperty>& properties, const DocumentProperty& line);
-
-/// One value for a line.
-[[nodiscard]] std::span<const Value> keepValue(RecordTree& texts, const Value& value);
 
 /// The type string of a property on the curve node that drives it, for a property of one number.
 [[nodiscard]] std::string_view channelTypeName(const FbxDataType& type);

@@ -184,7 +184,7 @@ TEST(BinarySink, RefusesTheByteBehindTwoGibibytes) {
         sink.beginRecord("T");
         sink.text(std::string_view(text).substr(0, tail));
         sink.endRecord();
-        return std::pair(output.size(), sink.failed());
+        return std::pair(sink.size(), sink.failed());
     };
     const std::size_t rest = 0x7FFFFFFF - static_cast<std::size_t>(sizeWithTail(0).first);
 

@@ -275,6 +275,50 @@ TEST_P(SinkLayout, WritesListsOfAHundredThousandElements) {
     EXPECT_EQ(arrayBack(numbers), numbers);
 }
 
+// ---- Repeated records ----
+
+void emitLines(RecordSink& sink) {
+    for (const std::int32_t number : {1, 2}) {
+        sink.beginRecord("Line");
+        sink.text("name");
+        sink.integer(number);
+        sink.real(0.5);
+        sink.endRecord();
+    }
+}
+
+/// Calls in a block and in a block of a block, so many times that the records exceed what a sink keeps in memory.
+std::string bytesOfNestedLines(const std::function<std::string(const support::Emit&)>& bytesOf,
+                               const std::function<void(RecordSink&)>& outer,
+                               const std::function<void(RecordSink&)>& inner) {
+    return bytesOf([&](RecordSink& sink) {
+        sink.beginRecord("Outer");
+        sink.beginBlock();
+        for (int i = 0; i < 3000; ++i) {
+            outer(sink);
+            sink.beginRecord("Inner");
+            sink.beginBlock();
+            inner(sink);
+            sink.endRecord();
+        }
+        sink.endRecord();
+    });
+}
+
+TEST_P(SinkLayout, RepeatsEncodedRecordsAsIfTheyWereWrittenAgain) {
+    RecordSink::EncodedRecords outer, inner;
+    const auto repeat = [](RecordSink& sink, RecordSink::EncodedRecords& records) {
+        if (records.bytes.empty())
+            records = sink.encoded(emitLines);
+        sink.repeat(records);
+    };
+
+    const std::string repeated = bytesOfNestedLines(
+        bytesOf, [&](RecordSink& sink) { repeat(sink, outer); }, [&](RecordSink& sink) { repeat(sink, inner); });
+
+    EXPECT_TRUE(repeated == bytesOfNestedLines(bytesOf, emitLines, emitLines));
+}
+
 // ---- Parts ----
 
 /// A record with a block, of which every part has another size.

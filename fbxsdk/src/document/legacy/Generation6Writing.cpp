@@ -8,6 +8,7 @@
 #include "document/DocumentSections.h"
 #include "document/PropertyNames.h"
 #include "document/RecordWriting.h"
+#include "document/WrittenLines.h"
 #include "document/legacy/LegacyLayout.h"
 #include "schema/OldNames.h"
 #include "schema/PropertyFlags.h"
@@ -46,6 +47,87 @@ template <std::size_t size>
 std::size_t rankIn(const std::string_view (&order)[size], std::string_view record) {
     return static_cast<std::size_t>(std::find(std::begin(order), std::end(order), record) - std::begin(order));
 }
+
+/// Lines of objects as records, each of them encoded once where many objects have it.
+class LineWriter {
+public:
+    /// Properties of objects of that subclass; of attributes inside Models if so.
+    LineWriter(std::string_view subClass, bool inModel) : mSubClass(subClass), mInModel(inModel) {}
+
+    [[nodiscard]] bool isFor(std::string_view subClass, bool inModel) const {
+        return mInModel == inModel && mSubClass == subClass;
+    }
+
+    /// Those with other names here are last.
+    void write(std::span<const WrittenLine> lines, RecordSink& sink) {
+        mRenamed.clear();
+        for (const WrittenLine& line : lines)
+            if (line.number == WrittenLine::kUnique)
+                writeUnique(line, sink);
+            else
+                writeShared(line, sink);
+        for (const DocumentProperty* property : mRenamed)
+            writeRecord(*property, sink);
+    }
+
+private:
+    enum class Way : std::uint8_t { unknown, left, renamed, encoded };
+    struct Shared {
+        Way way = Way::unknown;
+        RecordSink::EncodedRecords records;
+    };
+
+    void writeUnique(const WrittenLine& line, RecordSink& sink) {
+        const DocumentProperty& property = *line.property;
+        switch (wayOf(property)) {
+        case Way::left:
+            break;
+        case Way::renamed:
+            mRenamed.push_back(&property);
+            break;
+        default:
+            writeRecord(property, sink);
+        }
+    }
+
+    void writeShared(const WrittenLine& line, RecordSink& sink) {
+        const auto number = static_cast<std::size_t>(line.number);
+        if (mShared.size() <= number)
+            mShared.resize(number + 1);
+        Shared& shared = mShared[number];
+        if (shared.way == Way::unknown) {
+            shared.way = wayOf(*line.property);
+            if (shared.way == Way::encoded)
+                shared.records = sink.encoded([&](RecordSink& target) { writeRecord(*line.property, target); });
+        }
+        if (shared.way == Way::encoded)
+            sink.repeat(shared.records);
+        else if (shared.way == Way::renamed)
+            mRenamed.push_back(line.property);
+    }
+
+    [[nodiscard]] Way wayOf(const DocumentProperty& property) const {
+        if (goesWithoutSaying(property))
+            return Way::left;
+        const bool isRenamed = mInModel && legacyPropertyName(mSubClass, property.name) != property.name;
+        return isRenamed ? Way::renamed : Way::encoded;
+    }
+
+    /// Properties of an attribute inside a Model are marked by a letter.
+    void writeRecord(DocumentProperty property, RecordSink& sink) {
+        property.name = legacyPropertyName(mSubClass, property.name);
+        mFlags = property.flags;
+        if (mInModel)
+            mFlags += kAttributeFlagLetter;
+        writeProperty60(sink, property, mFlags);
+    }
+
+    std::string_view mSubClass;
+    bool mInModel;
+    std::vector<Shared> mShared; ///< by the number of a line
+    std::vector<const DocumentProperty*> mRenamed;
+    std::string mFlags;
+};
 
 class Generation6Writer {
 public:
@@ -167,37 +249,26 @@ private:
 
     /// Begins a record whose first value is an object's name.
     void writeFullName(std::string_view record, std::int64_t id) {
-        const LegacyName& name = mLayout.nameOf(id);
+        const LegacyName name = mLayout.nameOf(id);
         mSink.beginRecord(record);
         mSink.objectName(name.nameClass, name.name);
     }
 
-    /// The attribute's properties follow the Model's own, marked by a letter.
+    /// The attribute's properties follow the Model's own.
     void writeProperties(const DocumentObject& object, const DocumentObject* attribute) {
         const BlockScope block(mSink, "Properties60");
-        for (const DocumentProperty& property : object.properties)
-            writeProperty(property, object.subClass, property.flags);
+        writeLines(object, /*inModel*/ false);
         if (attribute)
-            writeAttributeProperties(*attribute);
+            writeLines(*attribute, /*inModel*/ true);
     }
 
-    /// Those with other names here are last.
-    void writeAttributeProperties(const DocumentObject& attribute) {
-        std::vector<const DocumentProperty*> renamed;
-        for (const DocumentProperty& property : attribute.properties)
-            if (legacyPropertyName(attribute.subClass, property.name) != property.name)
-                renamed.push_back(&property);
-            else
-                writeProperty(property, attribute.subClass, std::string(property.flags) + kAttributeFlagLetter);
-        for (const DocumentProperty* property : renamed)
-            writeProperty(*property, attribute.subClass, std::string(property->flags) + kAttributeFlagLetter);
-    }
-
-    void writeProperty(DocumentProperty property, std::string_view subClass, std::string_view flags) {
-        if (goesWithoutSaying(property))
-            return;
-        property.name = legacyPropertyName(subClass, property.name);
-        writeProperty60(mSink, property, flags);
+    void writeLines(const DocumentObject& object, bool inModel) {
+        auto writer = std::find_if(mLineWriters.begin(), mLineWriters.end(),
+                                   [&](const LineWriter& each) { return each.isFor(object.subClass, inModel); });
+        if (writer == mLineWriters.end())
+            writer = mLineWriters.emplace(writer, object.subClass, inModel);
+        mLines.fill(object);
+        writer->write(mLines.all(), mSink);
     }
 
     void writeGlobalSettings() {
@@ -230,7 +301,7 @@ private:
         const DocumentObject* held = mLayout.attributeOf(connection.destination);
         if (betweenObjects && held && held->id == connection.source)
             return;
-        const std::vector<std::int64_t>& holders = mLayout.holdersOf(connection.destination);
+        const std::span<const std::int64_t> holders = mLayout.holdersOf(connection.destination);
         if (!betweenObjects || holders.empty()) {
             writeEnds(connection, connection.destination);
             return;
@@ -243,8 +314,8 @@ private:
     void writeEnds(const DocumentConnection& connection, std::int64_t destination) {
         const bool fromProperty = !connection.sourceProperty.empty();
         const bool toProperty = !connection.destinationProperty.empty();
-        const LegacyName& from = mLayout.nameOf(connection.source);
-        const LegacyName& to = mLayout.nameOf(destination);
+        const LegacyName from = mLayout.nameOf(connection.source);
+        const LegacyName to = mLayout.nameOf(destination);
         mSink.beginRecord("Connect");
         mSink.text(fromProperty ? (toProperty ? "PP" : "PO") : (toProperty ? "OP" : "OO"));
         mSink.objectName(from.nameClass, from.name);
@@ -316,6 +387,8 @@ private:
     const VersionTraits& mTraits;
     RecordSink& mSink;
     LegacyLayout mLayout;
+    WrittenLines mLines;                  ///< of the object that is being written
+    std::vector<LineWriter> mLineWriters; ///< one for each subclass
 };
 
 } // namespace

@@ -72,20 +72,24 @@ private:
     }
 
     void moveInto(DocumentObject& geometry) {
+        const std::vector<DocumentObject*> blendShapes = sourcesOf(geometry.id, "Deformer", SubClass::kBlendShape);
+        if (blendShapes.empty())
+            return;
+        mDocument.settleProperties(geometry);
         std::vector<ShapeRecord> shapes;
         std::set<std::string, std::less<>> names;
         for (const DocumentProperty& property : geometry.properties)
             names.emplace(property.name);
-        for (const DocumentObject* blendShape : sourcesOf(geometry.id, "Deformer", SubClass::kBlendShape)) {
+        for (const DocumentObject* blendShape : blendShapes) {
             mRemoved.insert(blendShape->id);
-            for (const DocumentObject* channel : sourcesOf(blendShape->id, "Deformer", SubClass::kBlendShapeChannel))
+            for (DocumentObject* channel : sourcesOf(blendShape->id, "Deformer", SubClass::kBlendShapeChannel))
                 moveChannel(geometry, *channel, names, shapes);
         }
         if (!shapes.empty())
             appendShapes(geometry, std::move(shapes));
     }
 
-    void moveChannel(DocumentObject& geometry, const DocumentObject& channel, std::set<std::string, std::less<>>& names,
+    void moveChannel(DocumentObject& geometry, DocumentObject& channel, std::set<std::string, std::less<>>& names,
                      std::vector<ShapeRecord>& shapes) {
         mRemoved.insert(channel.id);
         const std::vector<DocumentObject*> targets = sourcesOf(channel.id, "Geometry", SubClass::kShape);
@@ -108,7 +112,8 @@ private:
         return name;
     }
 
-    void addWeight(DocumentObject& geometry, const DocumentObject& channel, std::string_view name) {
+    void addWeight(DocumentObject& geometry, DocumentObject& channel, std::string_view name) {
+        mDocument.settleProperties(channel);
         const DocumentProperty* percent = findProperty(channel.properties, kDeformPercent);
         DocumentProperty weight{name, "Number", "", "A", {}};
         if (percent) {
@@ -154,7 +159,10 @@ private:
 
     void renameNode(std::int64_t id, std::string_view name, std::unordered_map<std::int64_t, std::string_view>& nodes) {
         DocumentObject* node = find(id);
-        if (!node || node->record != "AnimationCurveNode" || node->properties.size() != 1)
+        if (!node || node->record != "AnimationCurveNode")
+            return;
+        mDocument.settleProperties(*node);
+        if (node->properties.size() != 1)
             return;
         node->name = name;
         node->properties.front().name = mDocument.tree->keepText(std::string(kPrefix) + std::string(name));
@@ -178,7 +186,13 @@ private:
 
 } // namespace
 
-void moveShapesInline(Document& document) { ShapeMover(document).move(); }
+void moveShapesInline(Document& document) {
+    const bool hasShapes =
+        std::any_of(document.objects.begin(), document.objects.end(),
+                    [](const DocumentObject& each) { return isKind(each, "Deformer", SubClass::kBlendShape); });
+    if (hasShapes)
+        ShapeMover(document).move();
+}
 
 } // namespace detail
 FBXSDK_NAMESPACE_END

@@ -36,38 +36,38 @@ bool betweenObjects(const DocumentConnection& connection) {
 
 LegacyLayout::LegacyLayout(const Document& document) : mDocument(document), mNames(document.objects) {
     for (const DocumentObject& object : document.objects)
-        mObjects.emplace(object.id, &object);
+        mObjects.at(object.id) = &object;
     findAttributes();
     findAnimation();
 }
 
-const DocumentObject* LegacyLayout::find(std::int64_t id) const {
-    const auto found = mObjects.find(id);
-    return found == mObjects.end() ? nullptr : found->second;
-}
+const DocumentObject* LegacyLayout::find(std::int64_t id) const { return mObjects[id]; }
 
 void LegacyLayout::findAttributes() {
+    std::vector<std::pair<std::int64_t, std::int64_t>> holders; // attribute and Model
     for (const DocumentConnection& connection : mDocument.connections) {
         const DocumentObject* attribute = find(connection.source);
         const DocumentObject* model = find(connection.destination);
         const bool holds =
             betweenObjects(connection) && attribute && model && model->record == "Model" && standsInModel(*attribute);
         // Of several attributes the first one is in the Model.
-        if (holds && mAttributes.emplace(model->id, attribute).second)
-            mHolders[attribute->id].push_back(model->id);
+        if (!holds || attributeOf(model->id))
+            continue;
+        mAttributes.at(model->id) = attribute;
+        holders.emplace_back(attribute->id, model->id);
+    }
+    std::stable_sort(holders.begin(), holders.end(), [](const auto& a, const auto& b) { return a.first < b.first; });
+    mHolders.reserve(holders.size()); // the spans stay valid
+    for (const auto& [attribute, model] : holders) {
+        mHolders.push_back(model);
+        std::span<const std::int64_t>& models = mHoldersOf.at(attribute);
+        models = models.empty() ? std::span(&mHolders.back(), 1) : std::span(models.data(), models.size() + 1);
     }
 }
 
-const DocumentObject* LegacyLayout::attributeOf(std::int64_t model) const {
-    const auto found = mAttributes.find(model);
-    return found == mAttributes.end() ? nullptr : found->second;
-}
+const DocumentObject* LegacyLayout::attributeOf(std::int64_t model) const { return mAttributes[model]; }
 
-const std::vector<std::int64_t>& LegacyLayout::holdersOf(std::int64_t attribute) const {
-    static const std::vector<std::int64_t> kNone;
-    const auto found = mHolders.find(attribute);
-    return found == mHolders.end() ? kNone : found->second;
-}
+std::span<const std::int64_t> LegacyLayout::holdersOf(std::int64_t attribute) const { return mHoldersOf[attribute]; }
 
 bool LegacyLayout::standsAlone(const DocumentObject& object) const {
     return !isAnimation(object) && holdersOf(object.id).empty();

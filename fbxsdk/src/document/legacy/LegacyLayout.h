@@ -2,6 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 #pragma once
 
+#include <span>
 #include <unordered_map>
 #include <vector>
 
@@ -24,14 +25,14 @@ public:
     explicit LegacyLayout(const Document& document);
 
     [[nodiscard]] const Document& document() const { return mDocument; }
-    [[nodiscard]] const LegacyName& nameOf(std::int64_t id) const { return mNames[id]; }
+    [[nodiscard]] LegacyName nameOf(std::int64_t id) const { return mNames[id]; }
     /// Null when there is none of that id.
     [[nodiscard]] const DocumentObject* find(std::int64_t id) const;
 
     /// The attribute inside a Model; null when it has none.
     [[nodiscard]] const DocumentObject* attributeOf(std::int64_t model) const;
     /// The Models that contain an attribute; empty for objects with a record of their own.
-    [[nodiscard]] const std::vector<std::int64_t>& holdersOf(std::int64_t attribute) const;
+    [[nodiscard]] std::span<const std::int64_t> holdersOf(std::int64_t attribute) const;
     /// Whether the object has a record of its own in the file.
     [[nodiscard]] bool standsAlone(const DocumentObject& object) const;
 
@@ -46,9 +47,9 @@ private:
 
     const Document& mDocument;
     LegacyNames mNames;
-    std::unordered_map<std::int64_t, const DocumentObject*> mObjects;
-    std::unordered_map<std::int64_t, const DocumentObject*> mAttributes;
-    std::unordered_map<std::int64_t, std::vector<std::int64_t>> mHolders;
+    IdTable<const DocumentObject*> mObjects, mAttributes;
+    std::vector<std::int64_t> mHolders; ///< those of one attribute next to each other
+    IdTable<std::span<const std::int64_t>> mHoldersOf;
     std::unordered_map<std::string_view, std::int64_t> mBaseLayers; ///< by the name of the first stack that has one
     // The curve nodes of each layer; the curves of each curve node and its target.
     std::unordered_map<std::int64_t, std::vector<std::int64_t>> mMembers;

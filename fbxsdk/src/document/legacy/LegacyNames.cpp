@@ -4,7 +4,9 @@
 // Two passes: unique names stay unchanged, whatever numbered names the others need.
 #include "document/legacy/LegacyNames.h"
 
-#include "container/FileFormat.h"
+#include <functional>
+#include <unordered_map>
+#include <unordered_set>
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -13,33 +15,38 @@ namespace {
 /// The root is never declared, but no object may take its name.
 constexpr std::string_view kRootClass = "Model", kRootName = "Scene";
 
-std::string keyOf(std::string_view nameClass, std::string_view name) {
-    std::string key(nameClass);
-    key += kAsciiNameSeparator;
-    key += name;
-    return key;
-}
+struct HashOfName {
+    std::size_t operator()(const LegacyName& name) const {
+        constexpr std::size_t kFactor = 31;
+        const std::hash<std::string_view> hash;
+        return hash(name.nameClass) * kFactor + hash(name.name);
+    }
+};
 
 } // namespace
 
 LegacyNames::LegacyNames(const std::vector<DocumentObject>& objects) {
-    mNames.emplace(0, LegacyName{kRootClass, std::string(kRootName)});
-    std::unordered_set<std::string> taken{keyOf(kRootClass, kRootName)};
+    mNames.at(0) = {kRootClass, kRootName};
+    std::unordered_set<LegacyName, HashOfName> taken{mNames[0]};
+    taken.reserve(objects.size());
     std::vector<const DocumentObject*> clashing;
-    for (const DocumentObject& object : objects)
-        if (taken.insert(keyOf(object.content->nameClass, object.name)).second)
-            mNames.emplace(object.id, LegacyName{object.content->nameClass, std::string(object.name)});
+    for (const DocumentObject& object : objects) {
+        const LegacyName name{object.content->nameClass, object.name};
+        if (taken.insert(name).second)
+            mNames.at(object.id) = name;
         else
             clashing.push_back(&object);
-    std::unordered_map<std::string, int> numbers; // the last one that was used after a name
+    }
+    std::unordered_map<LegacyName, int, HashOfName> numbers; // the last one that was used after a name
     for (const DocumentObject* object : clashing) {
+        int& number = numbers[{object->content->nameClass, object->name}];
         const std::string base = std::string(object->name) + "_ncl1_";
-        int& number = numbers[keyOf(object->content->nameClass, base)];
-        std::string name;
-        do
-            name = base + std::to_string(++number);
-        while (!taken.insert(keyOf(object->content->nameClass, name)).second);
-        mNames.emplace(object->id, LegacyName{object->content->nameClass, std::move(name)});
+        LegacyName& name = mNames.at(object->id);
+        std::string& text = mNumbered.emplace_back();
+        do {
+            text = base + std::to_string(++number);
+            name = {object->content->nameClass, text};
+        } while (!taken.insert(name).second);
     }
 }
 

@@ -14,6 +14,7 @@
 #include "document/DocumentSections.h"
 #include "document/PropertyNames.h"
 #include "document/RecordWriting.h"
+#include "document/WrittenLines.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -57,7 +58,7 @@ private:
         for (const auto& [id, properties] : driven) {
             if (mLayout.find(id)->record == "Model")
                 models.insert(id);
-            const std::vector<std::int64_t>& holders = mLayout.holdersOf(id);
+            const std::span<const std::int64_t> holders = mLayout.holdersOf(id);
             models.insert(holders.begin(), holders.end());
         }
         return models;
@@ -97,7 +98,7 @@ private:
     }
 
     void beginObject(std::string_view record, std::int64_t id) {
-        const LegacyName& name = mLayout.nameOf(id);
+        const LegacyName name = mLayout.nameOf(id);
         mSink.beginRecord(record);
         mSink.objectName(name.nameClass, name.name);
         mSink.beginBlock();
@@ -118,15 +119,17 @@ private:
             if (driven != properties.end())
                 writeComponents(*driven);
             else
-                writeStatic(findProperty(model.properties, row.property));
+                writeStatic(model, row.property);
             writeInteger(mSink, "LayerType", row.layerType);
         }
     }
 
-    void writeStatic(const DocumentProperty* property) {
-        for (std::size_t i = 0; property && i < std::min(property->values.size(), kAxes.size()); ++i) {
+    void writeStatic(const DocumentObject& model, std::string_view property) {
+        mLines.fill(model);
+        const WrittenLine* const line = mLines.find(property);
+        for (std::size_t i = 0; line && i < std::min(line->property->values.size(), kAxes.size()); ++i) {
             const BlockScope block(mSink, "Channel", kAxes[i]);
-            writeReal(mSink, "Default", property->values[i].toReal());
+            writeReal(mSink, "Default", line->property->values[i].toReal());
             writeColor();
         }
     }
@@ -136,23 +139,25 @@ private:
             if (isTransform(driven.property))
                 continue;
             const BlockScope block(mSink, "Channel", legacyPropertyName(subClass, driven.property));
-            if (driven.node->properties.size() == 1)
-                writeKeys(driven, driven.node->properties.front());
+            mLines.fill(*driven.node);
+            if (mLines.all().size() == 1)
+                writeKeys(driven, mLines.all().front());
             else
                 writeComponents(driven);
         }
     }
 
     void writeComponents(const DrivenProperty& driven) {
-        for (const DocumentProperty& component : driven.node->properties) {
-            const BlockScope block(mSink, "Channel", component.name.substr(kPrefix.size()));
+        mLines.fill(*driven.node);
+        for (const WrittenLine& component : mLines.all()) {
+            const BlockScope block(mSink, "Channel", component.property->name.substr(kPrefix.size()));
             writeKeys(driven, component);
         }
     }
 
-    void writeKeys(const DrivenProperty& driven, const DocumentProperty& component) {
-        const auto found = driven.curves.find(component.name);
-        const double value = component.values.empty() ? 0.0 : component.values.front().toReal();
+    void writeKeys(const DrivenProperty& driven, const WrittenLine& component) {
+        const auto found = driven.curves.find(component.property->name);
+        const double value = component.value().toReal();
         const auto write = [&](const CurveKeys& keys) { writeLegacyCurve(mSink, mTraits, keys, value); };
         if (found != driven.curves.end())
             found->second->content->curve(mTraits, write);
@@ -167,6 +172,7 @@ private:
     const LegacyLayout& mLayout;
     const VersionTraits& mTraits;
     RecordSink& mSink;
+    WrittenLines mLines; ///< of the curve node or Model that is being written
 };
 
 } // namespace
