@@ -19,6 +19,12 @@ namespace {
 
 /// Bytes that are passed on at a time.
 constexpr std::size_t kFlushBytes = std::size_t{1} << 16;
+/// Text after arrays that other threads write is in memory, up to this size.
+constexpr std::size_t kMostTextAfter = std::size_t{1} << 20;
+/// Shorter arrays are written faster than they are passed to another thread …
+constexpr std::size_t kFewestPending = 256;
+/// … and longer ones are passed in pieces.
+constexpr std::size_t kPieceElements = 4096;
 /// Lines of arrays are broken behind the first comma beyond this length …
 constexpr std::size_t kArrayLine = 2000;
 /// … and lists of single values, in the older layout, before the first one beyond this.
@@ -34,6 +40,59 @@ void appendBase64(std::string& text, std::span<const char> bytes) {
             bits = bits << 8U | (j < count ? static_cast<unsigned char>(bytes[i + j]) : 0U);
         for (std::size_t j = 0; j < 4; ++j)
             text += j <= count ? kDigits[bits >> (18U - 6U * j) & 63U] : '=';
+    }
+}
+
+/// Longer than any number as text.
+constexpr std::size_t kMostDigits = 32;
+
+template <class Number>
+char* printNumber(char* place, Number value) {
+    if constexpr (std::is_floating_point_v<Number>) {
+        if (!std::isfinite(value))
+            value = 0;
+    }
+    return std::to_chars(place, place + kMostDigits, value).ptr;
+}
+
+/// Elements separated by commas. A comma behind the last one, too, when others follow.
+template <class Number>
+std::string elementsText(std::span<const Number> values, bool othersFollow) {
+    std::string text(values.size() * (kMostDigits + 1), '\0');
+    char* end = text.data();
+    for (const Number value : values) {
+        end = printNumber(end, value);
+        *end++ = ',';
+    }
+    if (!othersFollow)
+        --end;
+    text.resize(static_cast<std::size_t>(end - text.data()));
+    return text;
+}
+
+/// Appends elements, and breaks the line behind the first comma beyond the length of one. `line` is the length of the
+/// last one.
+void appendLines(std::string& text, std::string_view elements, std::size_t& line) {
+    while (!elements.empty()) {
+        const std::size_t comma = elements.find(',', line < kArrayLine ? kArrayLine - line : 0);
+        const std::size_t length = comma == std::string_view::npos ? elements.size() : comma + 1;
+        text += elements.substr(0, length);
+        line += length;
+        elements.remove_prefix(length);
+        if (comma != std::string_view::npos) {
+            text += '\n';
+            line = 0;
+        }
+    }
+}
+
+/// Calls with each piece of an array, and whether others follow.
+template <class Number, class Use>
+void eachPiece(std::span<const Number> values, const Use& use) {
+    while (!values.empty()) {
+        const std::size_t size = std::min(values.size(), kPieceElements);
+        use(values.first(size), size < values.size());
+        values = values.subspan(size);
     }
 }
 
@@ -61,11 +120,30 @@ void AsciiSink::endLine() {
 }
 
 void AsciiSink::flushWhenLong() {
-    if (mText.size() < kFlushBytes)
-        return;
-    mOutput.write(mText);
+    if (mText.size() >= kFlushBytes)
+        flush();
+}
+
+void AsciiSink::flush() {
+    while (mPending.isFirstDue() || (!mPending.isEmpty() && mPending.last().after.size() > kMostTextAfter))
+        settleFirst();
+    if (mPending.isEmpty())
+        mOutput.write(mText);
+    else
+        mPending.last().after += mText;
     mText.clear();
     mLineStart = 0;
+}
+
+/// Writes the first pending piece of an array and what follows it.
+void AsciiSink::settleFirst() {
+    const std::unique_ptr<PendingArray> first = mPending.takeFirst();
+    mLines.clear();
+    appendLines(mLines, first->bytes, mPendingLine);
+    mOutput.write(mLines);
+    mOutput.write(first->after);
+    if (!first->bytes.ends_with(',')) // the end of the array
+        mPendingLine = 0;
 }
 
 void AsciiSink::beginRecord(std::string_view name) {
@@ -109,20 +187,10 @@ void AsciiSink::separate(bool beforeText) {
 }
 
 template <class Number>
-void AsciiSink::append(Number value) {
-    if constexpr (std::is_floating_point_v<Number>) {
-        if (!std::isfinite(value))
-            value = 0;
-    }
-    char digits[32];
-    const auto result = std::to_chars(std::begin(digits), std::end(digits), value);
-    mText.append(digits, result.ptr);
-}
-
-template <class Number>
 void AsciiSink::number(Number value) {
     separate(/*beforeText*/ false);
-    append(value);
+    char digits[kMostDigits];
+    mText.append(digits, printNumber(digits, value));
 }
 
 void AsciiSink::byte(std::uint8_t value) { number(int{value}); }
@@ -183,18 +251,37 @@ void AsciiSink::arrayOf(std::span<const Number> values) {
     mText += '*' + std::to_string(values.size()) + " {\n";
     indent();
     mText += "a: ";
-    mLineStart = mText.size();
-    for (std::size_t i = 0; i < values.size(); ++i) {
-        if (i > 0) {
-            mText += ',';
-            if (mText.size() - mLineStart > kArrayLine)
-                endLine();
-        }
-        append(values[i]);
-    }
+    if (values.size() < kFewestPending || !mPending.hasThreads())
+        writeElements(values);
+    else
+        passElements(values);
     mText += '\n';
     mText.append(mOpen.size() - 1, '\t');
     mText += "} ";
+}
+
+template <class Number>
+void AsciiSink::writeElements(std::span<const Number> values) {
+    std::size_t line = 0;
+    eachPiece(values, [&](std::span<const Number> piece, bool othersFollow) {
+        appendLines(mText, elementsText(piece, othersFollow), line);
+        flushWhenLong();
+    });
+}
+
+/// To other threads.
+template <class Number>
+void AsciiSink::passElements(std::span<const Number> values) {
+    eachPiece(
+        values,
+        [&](std::span<const Number> piece, bool othersFollow) {
+            flush();
+            mPending.add(
+                piece.size() * kMostDigits,
+                [copy = std::vector<Number>(piece.begin(), piece.end()), othersFollow](std::size_t) {
+                    return elementsText(std::span<const Number>(copy), othersFollow);
+                });
+        });
 }
 
 void AsciiSink::array(std::span<const double> values) { arrayOf(values); }
@@ -243,9 +330,9 @@ void AsciiSink::heading(std::string_view title) {
 
 void AsciiSink::finish() {
     assert(mOpen.empty());
-    mOutput.write(mText);
-    mText.clear();
-    mLineStart = 0;
+    flush();
+    while (!mPending.isEmpty())
+        settleFirst();
 }
 
 } // namespace detail

@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "container/ByteOutput.h"
+#include "container/PendingArrays.h"
 #include "container/RecordSink.h"
 
 FBXSDK_NAMESPACE_BEGIN
@@ -37,6 +38,7 @@ public:
     void raw(std::span<const char> bytes) override;
     void objectName(std::string_view className, std::string_view name) override;
 
+    using RecordSink::array;
     void array(std::span<const double> values) override;
     void array(std::span<const float> values) override;
     void array(std::span<const std::int32_t> values) override;
@@ -66,18 +68,25 @@ private:
     void separate(bool beforeText);
     template <class Number>
     void number(Number value);
-    template <class Number>
-    void append(Number value);
     void appendEscaped(std::string_view text);
     template <class Number>
     void arrayOf(std::span<const Number> values);
+    template <class Number>
+    void writeElements(std::span<const Number> values);
+    template <class Number>
+    void passElements(std::span<const Number> values);
+    void flush();
     void flushWhenLong();
+    void settleFirst();
 
     ByteOutput& mOutput;
     std::uint32_t mVersion;
     std::vector<OpenRecord> mOpen;
-    std::string mText;          ///< not passed on yet
+    std::string mText;          ///< not passed on yet, behind the pending arrays
     std::size_t mLineStart = 0; ///< of the line being written, within mText
+    PendingArrays mPending;
+    std::string mLines;           ///< reused for each pending piece
+    std::size_t mPendingLine = 0; ///< length of the last line of the pieces that are written
 };
 
 } // namespace detail

@@ -9,12 +9,10 @@
 #include <cstring>
 #include <limits>
 #include <memory>
-
-#include <fbxsdk/extensions/Threads.h>
+#include <utility>
 
 #include "container/ByteOrder.h"
 #include "container/FileFormat.h"
-#include "core/Parallel.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -26,6 +24,8 @@ constexpr std::size_t kFooterAlignment = 16;
 constexpr std::size_t kFooterZeros = 120;
 constexpr FileCode kFooterMagic{0xF8, 0x5A, 0x8C, 0x6A, 0xDE, 0xF5, 0xD9, 0x7E,
                                 0xEC, 0xE9, 0x0C, 0xE3, 0x75, 0x8F, 0x29, 0x0B};
+/// What follows pending arrays is in memory, up to this size.
+constexpr std::size_t kMostBytesAfter = std::size_t{1} << 20;
 /// Sizes of texts and arrays are 32 bits wide in every version.
 constexpr std::uint64_t kMaxValueBytes = std::numeric_limits<std::uint32_t>::max();
 
@@ -55,6 +55,31 @@ std::span<const char> fileBytes(std::span<const Number> values, std::vector<char
     return swapped;
 }
 
+/// An array of a version that packs them.
+template <class Number>
+struct PackedArray {
+    char code;
+    std::span<const Number> values;
+
+    /// Passes on the array as files hold it, compressed where that is shorter.
+    template <class Write>
+    void encode(Deflater& deflater, const Write& write) const {
+        std::vector<char> swapped;
+        const std::span<const char> bytes = fileBytes(values, swapped);
+        std::span<const char> stream;
+        if (bytes.size() >= kShortestCompressed)
+            stream = deflater.deflated(bytes);
+        const std::span<const char> stored = stream.empty() ? bytes : stream;
+        char head[13];
+        head[0] = code;
+        storeNumber(head + 1, static_cast<std::uint32_t>(values.size()));
+        storeNumber(head + 5, std::uint32_t{!stream.empty()});
+        storeNumber(head + 9, static_cast<std::uint32_t>(stored.size()));
+        write(std::span<const char>(head));
+        write(stored);
+    }
+};
+
 } // namespace
 
 BinarySink::BinarySink(ByteOutput& output, std::uint32_t version, std::uint64_t maxNarrowSize)
@@ -76,48 +101,91 @@ void BinarySink::setFault(const std::string& fault) {
         mFault = fault;
 }
 
-void BinarySink::writeZeros(std::size_t count) { std::memset(mWindow.extend(count), 0, count); }
+/// In the file, or while arrays are pending, in the bytes after the last one.
+std::uint64_t BinarySink::place() { return mPending.isEmpty() ? mWindow.size() : mPending.last().after.size(); }
+
+char* BinarySink::extend(std::size_t count) {
+    if (mPending.isEmpty())
+        return mWindow.extend(count);
+    std::string& bytes = mPending.last().after;
+    bytes.resize(bytes.size() + count);
+    return bytes.data() + bytes.size() - count;
+}
+
+void BinarySink::write(std::span<const char> bytes) {
+    if (mPending.isEmpty())
+        mWindow.write(bytes);
+    else
+        mPending.last().after.append(bytes.data(), bytes.size());
+}
+
+void BinarySink::writeZeros(std::size_t count) { std::memset(extend(count), 0, count); }
 
 void BinarySink::beginRecord(std::string_view name) {
     assert(name.size() <= std::numeric_limits<std::uint8_t>::max());
     assert(mOpen.empty() || mOpen.back().hasBlock);
-    const std::uint64_t start = mWindow.size();
+    mOpen.emplace_back();
+    mark(RecordMark::Kind::begin, place(), headSize() + name.size());
     writeZeros(headSize() - 1);
-    char* const lengthAndName = mWindow.extend(1 + name.size());
+    char* const lengthAndName = extend(1 + name.size());
     storeNumber(lengthAndName, static_cast<std::uint8_t>(name.size()));
     std::copy(name.begin(), name.end(), lengthAndName + 1);
-    mOpen.push_back({.start = start, .valuesStart = start + headSize() + name.size()});
 }
 
 void BinarySink::beginBlock() {
     assert(!mOpen.empty() && !mOpen.back().hasBlock);
     mOpen.back().hasBlock = true;
-    mOpen.back().valuesEnd = mWindow.size();
+    mark(RecordMark::Kind::block, place());
 }
 
 void BinarySink::endRecord() {
     assert(!mOpen.empty());
-    OpenRecord record = mOpen.back();
+    const OpenRecord record = mOpen.back();
     mOpen.pop_back();
     if (record.hasBlock)
         writeZeros(headSize());
-    else
-        record.valuesEnd = mWindow.size();
-    checkSize();
-    if (!failed())
-        patchHead(record);
+    mark(RecordMark::Kind::end, place(), record.valueCount);
+    if (!mPending.isEmpty() && mPending.last().after.size() > kMostBytesAfter)
+        settleAll();
 }
 
-void BinarySink::checkSize() {
-    if (mWindow.size() > mMaxSize) {
+void BinarySink::checkSize(std::uint64_t size) {
+    if (size > mMaxSize) {
         setFault("the file exceeds the " + std::to_string(mMaxSize) + " bytes that a binary file of version " +
                  std::to_string(mVersion) + " can have; files of version " + std::to_string(kFirstWideVersion) +
                  " can be larger");
     }
 }
 
-void BinarySink::patchHead(const OpenRecord& record) {
-    const std::uint64_t fields[] = {mWindow.size(), record.valueCount, record.valuesEnd - record.valuesStart};
+// While arrays are pending nobody knows where in the file a record is: what is to be done there is marked.
+void BinarySink::mark(RecordMark::Kind kind, std::uint64_t place, std::uint64_t count) {
+    if (mPending.isEmpty())
+        apply({kind, place, count}, 0);
+    else
+        mPending.last().marks.push_back({kind, place, count});
+}
+
+void BinarySink::apply(const RecordMark& mark, std::uint64_t base) {
+    const std::uint64_t place = base + mark.place;
+    if (mark.kind == RecordMark::Kind::begin) {
+        mPlaces.push_back({place, place + mark.count});
+        return;
+    }
+    RecordPlace& record = mPlaces.back();
+    if (mark.kind == RecordMark::Kind::block) {
+        record.valuesEnd = place;
+        return;
+    }
+    if (record.valuesEnd == 0)
+        record.valuesEnd = place;
+    checkSize(place);
+    if (!failed())
+        patchHead(record, place, mark.count);
+    mPlaces.pop_back();
+}
+
+void BinarySink::patchHead(const RecordPlace& record, std::uint64_t end, std::uint64_t valueCount) {
+    const std::uint64_t fields[] = {end, valueCount, record.valuesEnd - record.valuesStart};
     char head[3 * sizeof(std::uint64_t)];
     std::size_t size = 0;
     for (const std::uint64_t field : fields)
@@ -125,6 +193,21 @@ void BinarySink::patchHead(const OpenRecord& record) {
     mWindow.overwrite(record.start, std::span(head, size));
     if (mIsFragment)
         mHeads.push_back(record.start);
+}
+
+/// Writes the first pending array and what follows it.
+void BinarySink::settleFirst() {
+    const std::unique_ptr<PendingArray> first = mPending.takeFirst();
+    mWindow.write(first->bytes);
+    const std::uint64_t base = mWindow.size();
+    mWindow.write(first->after);
+    for (const RecordMark& mark : first->marks)
+        apply(mark, base);
+}
+
+void BinarySink::settleAll() {
+    while (!mPending.isEmpty())
+        settleFirst();
 }
 
 /// Size in bytes of an offset or a count in heads.
@@ -135,42 +218,6 @@ std::size_t BinarySink::storeOffset(char* bytes, std::uint64_t offset) const {
     }
     storeNumber(bytes, static_cast<std::uint32_t>(offset));
     return sizeof(std::uint32_t);
-}
-
-// Most of the time is spent deflating arrays. Each part becomes a fragment of a file with offsets of its own, to which
-// its final position is added at the end: the bytes are the same as when the parts are written one after the other.
-void BinarySink::parts(std::span<const Part> list) {
-    assert(mOpen.empty() || mOpen.back().hasBlock);
-    if (extensions::maximumThreads() == 1) {
-        RecordSink::parts(list);
-        return;
-    }
-    std::vector<MemoryOutput> outputs(list.size());
-    std::vector<std::unique_ptr<BinarySink>> fragments;
-    fragments.reserve(list.size());
-    for (MemoryOutput& output : outputs)
-        fragments.emplace_back(new BinarySink(output, *this));
-    forEachInParallel(list.size(), [&](std::size_t i) {
-        list[i](*fragments[i]);
-        fragments[i]->mWindow.flush();
-    });
-    for (std::size_t i = 0; i < list.size(); ++i) {
-        append(*fragments[i], outputs[i].takeBytes());
-        fragments[i].reset();
-    }
-}
-
-void BinarySink::append(const BinarySink& fragment, std::string bytes) {
-    const std::uint64_t place = mWindow.size();
-    for (const std::uint64_t head : fragment.mHeads) {
-        if (mIsFragment)
-            mHeads.push_back(place + head);
-        moveHead(bytes.data() + head, place);
-    }
-    mWindow.write(bytes);
-    if (!fragment.mFault.empty())
-        setFault(fragment.mFault);
-    checkSize();
 }
 
 /// Adds to the offset of the record's end.
@@ -190,6 +237,7 @@ RecordSink::EncodedRecords BinarySink::encoded(const Part& part) const {
 }
 
 void BinarySink::repeat(const EncodedRecords& records) {
+    settleAll();
     const std::uint64_t place = mWindow.size();
     char* const bytes = mWindow.extend(records.bytes.size());
     std::copy(records.bytes.begin(), records.bytes.end(), bytes);
@@ -198,13 +246,13 @@ void BinarySink::repeat(const EncodedRecords& records) {
             mHeads.push_back(place + head);
         moveHead(bytes + head, place);
     }
-    checkSize();
+    checkSize(mWindow.size());
 }
 
 template <class Number>
 void BinarySink::scalar(char code, Number value) {
     assert(!mOpen.empty() && !mOpen.back().hasBlock);
-    char* const bytes = mWindow.extend(1 + sizeof(Number));
+    char* const bytes = extend(1 + sizeof(Number));
     bytes[0] = code;
     storeNumber(bytes + 1, value);
     ++mOpen.back().valueCount;
@@ -226,7 +274,7 @@ void BinarySink::sizedBytes(char code, std::string_view first, std::string_view 
     }
     scalar(code, static_cast<std::uint32_t>(size));
     for (const std::string_view part : {first, second, third})
-        mWindow.write(bytesOf(part));
+        write(bytesOf(part));
 }
 
 void BinarySink::text(std::string_view value) { sizedBytes('S', value); }
@@ -245,26 +293,61 @@ void BinarySink::arrayOf(char arrayCode, char scalarCode, std::span<const Number
         scalarList(scalarCode, values);
 }
 
+// Most of the time is spent deflating arrays. With several threads other ones do that while the caller's goes on with
+// the records after them; the bytes are the same.
 template <class Number>
 void BinarySink::packedArray(char code, std::span<const Number> values) {
-    if (values.size_bytes() > kMaxValueBytes) {
-        setFault("an array of " + std::to_string(values.size()) + " elements is too long for the file format");
+    if (!beginPackedArray(values))
         return;
-    }
-    std::vector<char> swapped;
-    std::span<const char> bytes = fileBytes(values, swapped);
-    std::span<const char> stream;
-    if (bytes.size() >= kShortestCompressed)
-        stream = mDeflater.deflated(bytes);
-    const bool compressed = !stream.empty();
-    if (compressed)
-        bytes = stream;
-    scalar(code, static_cast<std::uint32_t>(values.size()));
-    char head[8];
-    storeNumber(head, std::uint32_t{compressed});
-    storeNumber(head + 4, static_cast<std::uint32_t>(bytes.size()));
-    mWindow.write(head);
-    mWindow.write(bytes);
+    if (isPassedOn(values.size_bytes()))
+        passArray(code, std::vector<Number>(values.begin(), values.end()));
+    else
+        writeArray(code, values);
+}
+
+template <class Number>
+void BinarySink::ownedArray(char arrayCode, char scalarCode, std::vector<Number> values) {
+    const std::span<const Number> elements = values;
+    if (mVersion < kFirstVersionWithArrays || !isPassedOn(elements.size_bytes()))
+        arrayOf(arrayCode, scalarCode, elements);
+    else if (beginPackedArray(elements))
+        passArray(arrayCode, std::move(values));
+}
+
+/// False with a fault for more elements than files can hold.
+template <class Number>
+bool BinarySink::beginPackedArray(std::span<const Number> values) {
+    assert(!mOpen.empty() && !mOpen.back().hasBlock);
+    ++mOpen.back().valueCount;
+    while (mPending.isFirstDue())
+        settleFirst();
+    if (values.size_bytes() <= kMaxValueBytes)
+        return true;
+    setFault("an array of " + std::to_string(values.size()) + " elements is too long for the file format");
+    return false;
+}
+
+bool BinarySink::isPassedOn(std::size_t bytes) {
+    return !mIsFragment && bytes >= kShortestCompressed && mPending.hasThreads();
+}
+
+template <class Number>
+void BinarySink::writeArray(char code, std::span<const Number> values) {
+    PackedArray<Number>{code, values}.encode(
+        mDeflaters[0], [this](std::span<const char> bytes) { write(bytes); });
+}
+
+template <class Number>
+void BinarySink::passArray(char code, std::vector<Number> values) {
+    while (mDeflaters.size() < mPending.workers())
+        mDeflaters.emplace_back();
+    const std::size_t size = values.size() * sizeof(Number);
+    mPending.add(size, [this, code, elements = std::move(values)](std::size_t worker) {
+        std::string encoded;
+        PackedArray<Number>{code, elements}.encode(
+            mDeflaters[worker], [&](std::span<const char> bytes) { encoded.append(bytes.begin(), bytes.end()); });
+        return encoded;
+    });
 }
 
 template <class Number>
@@ -277,6 +360,8 @@ void BinarySink::array(std::span<const double> values) { arrayOf('d', 'D', value
 void BinarySink::array(std::span<const float> values) { arrayOf('f', 'F', values); }
 void BinarySink::array(std::span<const std::int32_t> values) { arrayOf('i', 'I', values); }
 void BinarySink::array(std::span<const std::int64_t> values) { arrayOf('l', 'L', values); }
+void BinarySink::array(std::vector<double>&& values) { ownedArray('d', 'D', std::move(values)); }
+void BinarySink::array(std::vector<std::int32_t>&& values) { ownedArray('i', 'I', std::move(values)); }
 
 void BinarySink::array(std::span<const std::uint8_t> values) {
     if (mVersion >= kFirstVersionWithArrays) {
@@ -291,6 +376,7 @@ void BinarySink::floatBits(std::span<const std::uint32_t> words) { arrayOf('f', 
 
 void BinarySink::finish(const CreationTime& time) {
     assert(mOpen.empty());
+    settleAll();
     writeZeros(headSize());
     mWindow.write(bytesOf(footerCode(time)));
     // Aligned or not, there is padding.

@@ -2,11 +2,13 @@
 // Copyright (c) Tarnell FBX contributors
 #pragma once
 
+#include <deque>
 #include <string>
 #include <vector>
 
 #include "container/FileId.h"
 #include "container/OutputWindow.h"
+#include "container/PendingArrays.h"
 #include "container/RecordSink.h"
 #include "container/ZlibStream.h"
 
@@ -44,9 +46,10 @@ public:
     void array(std::span<const std::int32_t> values) override;
     void array(std::span<const std::int64_t> values) override;
     void array(std::span<const std::uint8_t> values) override;
+    void array(std::vector<double>&& values) override;
+    void array(std::vector<std::int32_t>&& values) override;
     void floatBits(std::span<const std::uint32_t> words) override;
 
-    void parts(std::span<const Part> list) override;
     [[nodiscard]] EncodedRecords encoded(const Part& part) const override;
     void repeat(const EncodedRecords& records) override;
 
@@ -54,7 +57,7 @@ public:
     /// What cannot be written in this version; empty when nothing but perhaps the output failed.
     [[nodiscard]] const std::string& fault() const { return mFault; }
 
-    /// Bytes of the file so far, those that are not passed to the output yet included.
+    /// Bytes of the file up to the first array that another thread encodes.
     [[nodiscard]] std::uint64_t size() const { return mWindow.size(); }
 
     /// Ends the last list of records and writes the footer. All records must be ended.
@@ -65,18 +68,27 @@ private:
     BinarySink(ByteOutput& output, const BinarySink& whole);
 
     struct OpenRecord {
-        std::uint64_t start;
-        std::uint64_t valuesStart;
-        std::uint64_t valuesEnd = 0; ///< set when the block begins
         std::uint64_t valueCount = 0;
         bool hasBlock = false;
+    };
+    /// Where an open record is in the file, known once all arrays before it are encoded.
+    struct RecordPlace {
+        std::uint64_t start;
+        std::uint64_t valuesStart;
+        std::uint64_t valuesEnd = 0; ///< 0 until the block begins
     };
 
     [[nodiscard]] std::size_t headSize() const;
     void setFault(const std::string& fault);
-    void checkSize();
-    void patchHead(const OpenRecord& record);
-    void append(const BinarySink& fragment, std::string bytes);
+    void checkSize(std::uint64_t size);
+    [[nodiscard]] std::uint64_t place();
+    [[nodiscard]] char* extend(std::size_t count);
+    void write(std::span<const char> bytes);
+    void mark(RecordMark::Kind kind, std::uint64_t place, std::uint64_t count = 0);
+    void apply(const RecordMark& mark, std::uint64_t base);
+    void patchHead(const RecordPlace& record, std::uint64_t end, std::uint64_t valueCount);
+    void settleFirst();
+    void settleAll();
     void moveHead(char* head, std::uint64_t distance) const;
     std::size_t storeOffset(char* bytes, std::uint64_t offset) const;
     void writeZeros(std::size_t count);
@@ -88,6 +100,15 @@ private:
     template <class Number>
     void packedArray(char code, std::span<const Number> values);
     template <class Number>
+    void ownedArray(char arrayCode, char scalarCode, std::vector<Number> values);
+    [[nodiscard]] bool isPassedOn(std::size_t bytes);
+    template <class Number>
+    [[nodiscard]] bool beginPackedArray(std::span<const Number> values);
+    template <class Number>
+    void writeArray(char code, std::span<const Number> values);
+    template <class Number>
+    void passArray(char code, std::vector<Number> values);
+    template <class Number>
     void scalarList(char code, std::span<const Number> values);
 
     OutputWindow mWindow;
@@ -96,9 +117,11 @@ private:
     std::uint64_t mMaxSize;
     std::string mFault;
     std::vector<OpenRecord> mOpen;
+    std::vector<RecordPlace> mPlaces; ///< of the open records that begin before the first pending array
     bool mIsFragment = false;
-    std::vector<std::uint64_t> mHeads; ///< of a fragment: where its records begin
-    Deflater mDeflater;
+    std::vector<std::uint64_t> mHeads;  ///< of a fragment: where its records begin
+    std::deque<Deflater> mDeflaters{1}; ///< one for each thread
+    PendingArrays mPending;             ///< the last member: its threads use the deflaters
 };
 
 } // namespace detail

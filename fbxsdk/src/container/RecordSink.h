@@ -56,18 +56,14 @@ public:
     virtual void array(std::span<const std::int64_t> values) = 0;
     /// Booleans; each element is 0 or 1.
     virtual void array(std::span<const std::uint8_t> values) = 0;
+    /// The same for a sink that may go on using the elements.
+    virtual void array(std::vector<double>&& values) { array(std::span<const double>(values)); }
+    virtual void array(std::vector<std::int32_t>&& values) { array(std::span<const std::int32_t>(values)); }
     /// 32-bit words that files store as the bits of floats: the packed data of keys.
     virtual void floatBits(std::span<const std::uint32_t> words) = 0;
 
     /// Writes whole records, one after the other.
     using Part = std::function<void(RecordSink& sink)>;
-    /// Parts in this order. A sink may have several of them written at the same time: they must not change anything
-    /// that they share, nor use any other sink than the one that they are passed.
-    virtual void parts(std::span<const Part> list) {
-        for (const Part& part : list)
-            part(*this);
-    }
-
     /// A few short records as the sink writes them, to be written many times.
     struct EncodedRecords {
         std::string bytes;

@@ -201,6 +201,102 @@ bool WorkAhead::take(std::size_t piece) {
     return state == State::done;
 }
 
+WorkQueue::WorkQueue(std::size_t mostSize) : mMostHeld(mostSize) {
+    startThreads();
+    mMostHeld *= workers();
+}
+
+WorkQueue::~WorkQueue() {
+    const std::lock_guard lock(mMutex);
+    mIsEnded = true;
+    mAdded.notify_all(); // the threads are joined before the rest goes
+}
+
+void WorkQueue::startThreads() {
+    const auto most = static_cast<std::size_t>(std::max(0, maximum().load() - 1));
+    mThreads.reserve(most);
+    try {
+        while (mThreads.size() < most) {
+            HelperLeave leave(1);
+            if (leave.count() == 0)
+                break;
+            mThreads.emplace_back([this, worker = mThreads.size() + 1, own = std::move(leave)] { workOn(worker); });
+        }
+    } catch (const std::exception&) { // no thread, or no memory for one: the others do the work
+    }
+}
+
+void WorkQueue::workOn(std::size_t worker) {
+    std::unique_lock lock(mMutex);
+    while (true) {
+        mAdded.wait(lock, [this] { return mIsEnded || hasOpen(); });
+        if (mIsEnded)
+            return;
+        workOnFirstOpen(worker, lock);
+    }
+}
+
+void WorkQueue::workOnFirstOpen(std::size_t worker, std::unique_lock<std::mutex>& lock) {
+    Piece& piece = mPieces[mFirstOpen++]; // stays in place: it is taken when it is done
+    piece.state = State::begun;
+    mHeld -= piece.size;
+    lock.unlock();
+    std::size_t size = 0;
+    std::exception_ptr failure;
+    try {
+        size = piece.work(worker);
+        piece.work = nullptr;
+    } catch (...) {
+        failure = std::current_exception();
+    }
+    lock.lock();
+    piece.size = size;
+    piece.failure = std::move(failure);
+    piece.state = State::done;
+    mHeld += size;
+    mDone.notify_one();
+}
+
+void WorkQueue::add(std::size_t size, Work work) {
+    const std::lock_guard lock(mMutex);
+    mPieces.push_back({size, std::move(work)});
+    mHeld += size;
+    mAdded.notify_one();
+}
+
+bool WorkQueue::isFull() {
+    const std::lock_guard lock(mMutex);
+    return mHeld > mMostHeld;
+}
+
+bool WorkQueue::isFirstDone() {
+    const std::lock_guard lock(mMutex);
+    return !mPieces.empty() && mPieces.front().state == State::done;
+}
+
+bool WorkQueue::workOnOne() {
+    std::unique_lock lock(mMutex);
+    if (!hasOpen())
+        return false;
+    workOnFirstOpen(0, lock);
+    return true;
+}
+
+void WorkQueue::takeFirst() {
+    std::unique_lock lock(mMutex);
+    const auto isDone = [this] { return mPieces.front().state == State::done; };
+    while (!isDone() && hasOpen())
+        workOnFirstOpen(0, lock);
+    mDone.wait(lock, isDone);
+    const std::exception_ptr failure = mPieces.front().failure;
+    mHeld -= mPieces.front().size;
+    mPieces.pop_front();
+    --mFirstOpen;
+    lock.unlock();
+    if (failure)
+        std::rethrow_exception(failure);
+}
+
 } // namespace detail
 
 int extensions::maximumThreads() { return detail::maximum(); }

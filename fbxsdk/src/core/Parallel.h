@@ -6,6 +6,8 @@
 
 #include <condition_variable>
 #include <cstddef>
+#include <deque>
+#include <exception>
 #include <functional>
 #include <mutex>
 #include <optional>
@@ -57,6 +59,57 @@ private:
     std::size_t mReady = 0;     ///< size of the pieces that were started and are not taken yet
     std::size_t mMostReady;
     bool mIsGivenUp = false;
+    std::vector<std::jthread> mThreads;
+};
+
+/// Pieces of work that are added one by one: other threads do them, as many as `maximumThreads()` leaves, and the owner
+/// takes them in the order in which they were added. The owner is one thread.
+class WorkQueue {
+public:
+    /// Does a piece and returns the size of its result. The worker is below `workers()`; each does one piece at a time.
+    using Work = std::function<std::size_t(std::size_t worker)>;
+
+    /// Full when the pieces that wait, and the results that are not taken, exceed that size for each thread. Throws
+    /// std::bad_alloc.
+    explicit WorkQueue(std::size_t mostSize);
+    WorkQueue(const WorkQueue&) = delete;
+    WorkQueue& operator=(const WorkQueue&) = delete;
+    /// Waits for pieces in progress. Those that were not started are dropped.
+    ~WorkQueue();
+
+    /// The other threads and the owner, which is number 0.
+    [[nodiscard]] std::size_t workers() const { return mThreads.size() + 1; }
+
+    void add(std::size_t size, Work work);
+    [[nodiscard]] bool isFull();
+    /// Whether the first piece can be taken without waiting.
+    [[nodiscard]] bool isFirstDone();
+    /// Does a piece that waits. False when there is none.
+    bool workOnOne();
+    /// Removes the first piece. Waits for it, and does others meanwhile; rethrows what it threw.
+    void takeFirst();
+
+private:
+    enum class State { open, begun, done };
+    struct Piece {
+        std::size_t size; ///< until it is done, of the piece, then of the result
+        Work work;
+        State state = State::open;
+        std::exception_ptr failure{};
+    };
+
+    void startThreads();
+    void workOn(std::size_t worker);
+    void workOnFirstOpen(std::size_t worker, std::unique_lock<std::mutex>& lock);
+    [[nodiscard]] bool hasOpen() const { return mFirstOpen < mPieces.size(); }
+
+    std::mutex mMutex;
+    std::condition_variable mAdded, mDone;
+    std::deque<Piece> mPieces;  ///< those that are not taken
+    std::size_t mFirstOpen = 0; ///< those before it are begun or done
+    std::size_t mHeld = 0;      ///< size of those that are open or done
+    std::size_t mMostHeld;
+    bool mIsEnded = false;
     std::vector<std::jthread> mThreads;
 };
 

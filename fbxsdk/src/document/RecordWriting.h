@@ -8,6 +8,8 @@
 #include <initializer_list>
 #include <span>
 #include <string_view>
+#include <utility>
+#include <vector>
 
 #include "container/RecordSink.h"
 
@@ -29,6 +31,13 @@ template <class Number>
 void writeArray(RecordSink& sink, std::string_view name, std::span<const Number> values) {
     sink.beginRecord(name);
     sink.array(values);
+    sink.endRecord();
+}
+
+template <class Number>
+void writeArray(RecordSink& sink, std::string_view name, std::vector<Number>&& values) {
+    sink.beginRecord(name);
+    sink.array(std::move(values));
     sink.endRecord();
 }
 

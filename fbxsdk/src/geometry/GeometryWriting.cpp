@@ -53,22 +53,6 @@ void writePolygons(FbxMesh& mesh, RecordSink& sink) {
     writeInteger(sink, "GeometryVersion", kGeometryVersion);
 }
 
-/// Everything but the layers.
-std::vector<RecordSink::Part> partsOf(FbxGeometryBase& geometry) {
-    auto* mesh = FbxCast<FbxMesh>(&geometry);
-    if (!mesh)
-        return {[&geometry](RecordSink& sink) { writeNurbsRecords(geometry, sink); }};
-    return {[mesh](RecordSink& sink) { writeArray<double>(sink, "Vertices", packedPoints(*mesh)); },
-            [mesh](RecordSink& sink) { writePolygons(*mesh, sink); }};
-}
-
-/// Smaller meshes are written faster than a thread starts.
-bool isLarge(FbxGeometryBase& geometry) {
-    constexpr int kFewestCorners = 1 << 16;
-    const auto* mesh = FbxCast<FbxMesh>(&geometry);
-    return mesh && mesh->GetPolygonVertexCount() >= kFewestCorners;
-}
-
 /// The difference of a shape to its base: the points that it moves, and the offsets.
 struct ShapeOffsets {
     std::vector<std::int32_t> indices;
@@ -110,7 +94,13 @@ void writeGeometryRecords(FbxGeometryBase& geometry, const VersionTraits& traits
         writeShapeRecords(*shape, traits, sink);
         return;
     }
-    writeWithLayers(partsOf(geometry), geometry, hasEdges(geometry), traits, sink, isLarge(geometry));
+    if (auto* mesh = FbxCast<FbxMesh>(&geometry)) {
+        writeArray<double>(sink, "Vertices", packedPoints(*mesh));
+        writePolygons(*mesh, sink);
+    } else {
+        writeNurbsRecords(geometry, sink);
+    }
+    writeLayers(geometry, hasEdges(geometry), traits, sink);
     writeRecordsBehindLayers(geometry, sink);
 }
 

@@ -4,8 +4,6 @@
 // The records of geometry and of deformers.
 #pragma once
 
-#include <vector>
-
 #include <fbxsdk/FbxGeometryBase.h>
 #include <fbxsdk/FbxMesh.h>
 #include <fbxsdk/FbxShape.h>
@@ -25,9 +23,7 @@ void writeDeformerVersion(const FbxObject& deformer, const VersionTraits& traits
 void writeDeformerRecords(FbxObject& deformer, const VersionTraits& traits, RecordSink& sink);
 
 /// The elements and layers of a geometry. Without edges there are no elements that are mapped by them.
-/// `atOnce` allows the sink to write the parts and the elements at the same time, where elements are not shared.
-void writeWithLayers(std::vector<RecordSink::Part> parts, const FbxLayerContainer& container, bool hasEdges,
-                     const VersionTraits& traits, RecordSink& sink, bool atOnce);
+void writeLayers(const FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits, RecordSink& sink);
 
 /// NURBS surfaces and curves, trimmed surfaces, boundaries, patches and lines; nothing for other classes.
 void writeNurbsRecords(FbxGeometryBase& geometry, RecordSink& sink);

@@ -5,9 +5,9 @@
 // layers that name them.
 #include <algorithm>
 #include <map>
-#include <set>
 #include <stdexcept>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "document/RecordWriting.h"
@@ -82,7 +82,7 @@ void writeColors(const ElementRecords& records) {
         const FbxColor color = direct.GetAt(i);
         numbers.insert(numbers.end(), {color.mRed, color.mGreen, color.mBlue, color.mAlpha});
     }
-    writeArray<double>(records.sink, records.row.direct, numbers);
+    writeArray<double>(records.sink, records.row.direct, std::move(numbers));
     writeIndices<FbxLayerElementVertexColor>(records);
 }
 
@@ -208,24 +208,11 @@ public:
     LayerWriter(const FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits)
         : mContainer(container), mHasEdges(hasEdges), mTraits(traits), mKinds(allKinds()) {}
 
-    /// A part for each element, and one for the layers.
-    std::vector<RecordSink::Part> parts() {
-        std::vector<RecordSink::Part> list;
+    void write(RecordSink& sink) {
         for (const ElementKind& kind : mKinds)
-            addElements(kind, list);
-        list.emplace_back([this](RecordSink& sink) {
-            for (int i = 0; i < mContainer.GetLayerCount(); ++i)
-                writeLayer(i, sink);
-        });
-        return list;
-    }
-
-    /// Whether an element is in two slots, so that two parts read it.
-    [[nodiscard]] bool hasSharedElements() const {
-        std::set<const Element*> elements;
-        for (const auto& [elementAndSlot, number] : mNumbers)
-            elements.insert(elementAndSlot.first);
-        return elements.size() < mNumbers.size();
+            writeElements(kind, sink);
+        for (int i = 0; i < mContainer.GetLayerCount(); ++i)
+            writeLayer(i, sink);
     }
 
 private:
@@ -236,15 +223,13 @@ private:
     }
 
     /// An element in several layers is written once.
-    void addElements(const ElementKind& kind, std::vector<RecordSink::Part>& list) {
+    void writeElements(const ElementKind& kind, RecordSink& sink) {
         std::int32_t count = 0;
         for (int i = 0; i < mContainer.GetLayerCount(); ++i) {
             const Element* element = elementAt(*mContainer.GetLayer(i), kind.slot);
-            if (!element || mNumbers.count({element, kind.slot}) > 0)
+            if (!element || !mNumbers.try_emplace({element, kind.slot}, count).second)
                 continue;
-            mNumbers[{element, kind.slot}] = count;
-            list.emplace_back(
-                [this, &kind, element, count](RecordSink& sink) { writeElement(kind, *element, count, sink); });
+            writeElement(kind, *element, count, sink);
             ++count;
         }
     }
@@ -286,16 +271,8 @@ private:
 
 } // namespace
 
-void writeWithLayers(std::vector<RecordSink::Part> parts, const FbxLayerContainer& container, bool hasEdges,
-                     const VersionTraits& traits, RecordSink& sink, bool atOnce) {
-    LayerWriter layers(container, hasEdges, traits);
-    for (RecordSink::Part& part : layers.parts())
-        parts.push_back(std::move(part));
-    if (atOnce && !layers.hasSharedElements())
-        sink.parts(parts);
-    else
-        for (const RecordSink::Part& part : parts)
-            part(sink);
+void writeLayers(const FbxLayerContainer& container, bool hasEdges, const VersionTraits& traits, RecordSink& sink) {
+    LayerWriter(container, hasEdges, traits).write(sink);
 }
 
 } // namespace detail

@@ -10,6 +10,8 @@
 
 #include <gtest/gtest.h>
 
+#include <fbxsdk/extensions/Threads.h>
+
 #include "support/RecordText.h"
 #include "support/SinkOutput.h"
 
@@ -136,11 +138,19 @@ TEST(BinarySink, RefusesAFileTooLargeForNarrowHeads) {
     EXPECT_NE(sink.fault().find("7500"), std::string::npos) << sink.fault();
 }
 
-TEST(BinarySink, RefusesPartsThatTogetherAreTooLargeForNarrowHeads) {
+TEST(BinarySink, RefusesAFileThatArraysOfOtherThreadsMakeTooLarge) {
+    extensions::setMaximumThreads(3);
     MemoryOutput output;
-    BinarySink sink(output, 7400, /*maxNarrowSize*/ 100);
+    BinarySink sink(output, 7400, /*maxNarrowSize*/ 1000);
 
-    sink.parts(std::vector<RecordSink::Part>(4, emitCount));
+    const std::vector<std::int32_t> numbers(1000, 7);
+    for (int i = 0; i < 30; ++i) {
+        sink.beginRecord("Numbers");
+        sink.array(std::span<const std::int32_t>(numbers));
+        sink.endRecord();
+    }
+    sink.finish(support::kSampleTime);
+    extensions::setMaximumThreads(1);
 
     EXPECT_TRUE(sink.failed());
     EXPECT_NE(sink.fault().find("7500"), std::string::npos) << sink.fault();

@@ -4,6 +4,7 @@
 // What both sinks write, the readers read back: every type of value, in every layout.
 #include "container/RecordSink.h"
 
+#include <algorithm>
 #include <bit>
 #include <cmath>
 #include <functional>
@@ -319,82 +320,109 @@ TEST_P(SinkLayout, RepeatsEncodedRecordsAsIfTheyWereWrittenAgain) {
     EXPECT_TRUE(repeated == bytesOfNestedLines(bytesOf, emitLines, emitLines));
 }
 
-// ---- Parts ----
+// ---- Several threads ----
 
-/// A record with a block, of which every part has another size.
-void emitPart(RecordSink& sink, int number) {
-    sink.beginRecord("Part");
-    sink.integer(number);
-    sink.beginBlock();
-    sink.beginRecord("Numbers");
-    sink.array(std::span<const double>(std::vector<double>(static_cast<std::size_t>(number) * 100, 0.5 * number)));
-    sink.endRecord();
-    sink.beginRecord("Empty");
-    sink.beginBlock();
-    sink.endRecord();
-    sink.endRecord();
-}
+struct SinkThreads : SinkLayout {
+    ~SinkThreads() override { extensions::setMaximumThreads(1); }
 
-std::vector<RecordSink::Part> manyParts() {
-    std::vector<RecordSink::Part> parts;
-    for (int i = 0; i < 40; ++i)
-        parts.emplace_back([i](RecordSink& sink) { emitPart(sink, i); });
-    return parts;
-}
-
-struct SinkParts : SinkLayout {
-    SinkParts() { extensions::setMaximumThreads(3); }
-    ~SinkParts() override { extensions::setMaximumThreads(1); }
+    static std::string bytesWith(int threads, const support::Emit& emit) {
+        extensions::setMaximumThreads(threads);
+        return bytesOf(emit);
+    }
 };
-INSTANTIATE_TEST_SUITE_P(EveryLayout, SinkParts, kLayouts);
+INSTANTIATE_TEST_SUITE_P(EveryLayout, SinkThreads, kLayouts);
 
-void emitWhole(RecordSink& sink, const std::function<void()>& content) {
-    sink.beginRecord("Whole");
-    sink.beginBlock();
-    content();
-    sink.beginRecord("Last");
-    sink.integer(7);
+/// A record with a block, open as long as the object exists.
+class Block {
+public:
+    Block(RecordSink& sink, std::string_view name) : mSink(sink) {
+        sink.beginRecord(name);
+        sink.beginBlock();
+    }
+    Block(const Block&) = delete;
+    Block& operator=(const Block&) = delete;
+    ~Block() { mSink.endRecord(); }
+
+private:
+    RecordSink& mSink;
+};
+
+void emitInteger(RecordSink& sink, std::int32_t number) {
+    sink.beginRecord("Integer");
+    sink.integer(number);
     sink.endRecord();
+}
+
+template <class Number>
+void emitArray(RecordSink& sink, const std::vector<Number>& numbers) {
+    sink.beginRecord("Array");
+    sink.array(std::span<const Number>(numbers));
     sink.endRecord();
 }
 
-TEST_P(SinkParts, WritesPartsAsIfOneAfterTheOther) {
-    const std::string inTurn = bytesOf([](RecordSink& sink) {
-        emitWhole(
-            sink,
-            [&] {
-                for (const RecordSink::Part& part : manyParts())
-                    part(sink);
-            });
-    });
-    const std::string atOnce = bytesOf([](RecordSink& sink) { emitWhole(sink, [&] { sink.parts(manyParts()); }); });
-
-    EXPECT_TRUE(inTurn == atOnce);
+std::vector<double> noise(std::size_t size, unsigned seed) {
+    std::mt19937 random(seed);
+    std::vector<double> numbers(size);
+    std::generate(numbers.begin(), numbers.end(), [&] { return static_cast<double>(random() % 4096) / 16; });
+    return numbers;
 }
 
-TEST_P(SinkParts, WritesPartsOfParts) {
-    const std::string nested = bytesOf([](RecordSink& sink) {
-        const RecordSink::Part both[] = {[](RecordSink& first) { first.parts(manyParts()); },
-                                         [](RecordSink& second) { emitPart(second, 3); }};
-        sink.parts(both);
-    });
-    const std::string inTurn = bytesOf([](RecordSink& sink) {
-        for (const RecordSink::Part& part : manyParts())
-            part(sink);
-        emitPart(sink, 3);
-    });
-
-    EXPECT_TRUE(nested == inTurn);
+/// Objects with arrays of all sizes, records before, between and behind them, and values beside them.
+void emitObjects(RecordSink& sink) {
+    const Block objects(sink, "Objects");
+    for (unsigned i = 0; i < 60; ++i) {
+        const Block object(sink, "Object");
+        emitInteger(sink, static_cast<std::int32_t>(i));
+        sink.beginRecord("Numbers");
+        sink.text("first");
+        sink.array(std::span<const double>(noise(i * i * 3, i)));
+        sink.array(std::span<const std::int32_t>(std::vector<std::int32_t>(i * 40, 7)));
+        sink.integer(5);
+        if (i % 2 == 0) {
+            sink.beginBlock();
+            emitArray(sink, std::vector<float>(i * 100, 0.5F));
+        }
+        sink.endRecord();
+        const Block empty(sink, "Empty");
+    }
 }
 
-TEST_P(SinkParts, PassesOnWhatAPartThrows) {
+TEST_P(SinkThreads, WriteTheSameBytesWhateverTheirNumber) {
+    const std::string one = bytesWith(1, emitObjects);
+
+    for (const int threads : {2, 3, 5})
+        EXPECT_TRUE(bytesWith(threads, emitObjects) == one) << threads;
+}
+
+TEST_P(SinkThreads, WriteManyRecordsBehindAnArray) {
     const auto emit = [](RecordSink& sink) {
-        std::vector<RecordSink::Part> parts = manyParts();
-        parts[7] = [](RecordSink&) { throw std::bad_alloc(); };
-        sink.parts(parts);
+        const Block objects(sink, "Objects");
+        emitArray(sink, noise(300000, 1));
+        for (int i = 0; i < 200000; ++i)
+            emitInteger(sink, i);
     };
 
-    EXPECT_THROW(static_cast<void>(bytesOf(emit)), std::bad_alloc);
+    EXPECT_TRUE(bytesWith(3, emit) == bytesWith(1, emit));
+}
+
+TEST_P(SinkThreads, RepeatRecordsBehindAnArray) {
+    const auto emit = [](RecordSink& sink) {
+        const Block objects(sink, "Objects");
+        const RecordSink::EncodedRecords lines = sink.encoded(emitLines);
+        emitArray(sink, noise(30000, 1));
+        sink.repeat(lines);
+    };
+
+    EXPECT_TRUE(bytesWith(3, emit) == bytesWith(1, emit));
+}
+
+TEST_P(SinkThreads, EndWhenTheWriterGivesUp) {
+    const auto emit = [](RecordSink& sink) {
+        emitObjects(sink);
+        throw std::bad_alloc();
+    };
+
+    EXPECT_THROW(static_cast<void>(bytesWith(3, emit)), std::bad_alloc);
 }
 
 } // namespace

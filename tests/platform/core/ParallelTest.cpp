@@ -187,5 +187,80 @@ TEST_F(Parallel, GivesThreadsBackThatHaveNothingMoreToDoAhead) {
     EXPECT_GT(most, 1U);
 }
 
+TEST_F(Parallel, TakesWhatIsQueuedInItsOrder) {
+    std::vector<std::size_t> squares(1000), taken;
+    WorkQueue queue(10);
+    const auto take = [&] {
+        queue.takeFirst();
+        taken.push_back(squares[taken.size()]);
+    };
+    for (std::size_t i = 0; i < squares.size(); ++i) {
+        while (queue.isFirstDone())
+            take();
+        queue.add(1, [&squares, i](std::size_t) {
+            squares[i] = i * i;
+            return std::size_t{1};
+        });
+        if (queue.isFull() && !queue.workOnOne())
+            take();
+    }
+    while (taken.size() < squares.size())
+        take();
+
+    for (std::size_t i = 0; i < squares.size(); ++i)
+        ASSERT_EQ(taken[i], i * i);
+    EXPECT_FALSE(queue.isFirstDone());
+    EXPECT_FALSE(queue.workOnOne());
+}
+
+TEST_F(Parallel, IsFullOfWhatWaitsAndOfResults) {
+    extensions::setMaximumThreads(1);
+    WorkQueue queue(10);
+    const auto work = [](std::size_t worker) {
+        EXPECT_EQ(worker, 0U);
+        return std::size_t{20};
+    };
+    queue.add(8, work);
+    EXPECT_FALSE(queue.isFull());
+    queue.add(8, work);
+    EXPECT_TRUE(queue.isFull());
+    EXPECT_TRUE(queue.workOnOne());
+    EXPECT_TRUE(queue.isFull()) << "the result is larger";
+    queue.takeFirst();
+    EXPECT_FALSE(queue.isFull());
+}
+
+TEST_F(Parallel, RethrowsWhatQueuedWorkThrowsWhenItIsTaken) {
+    WorkQueue queue(10);
+    queue.add(
+        1, [](std::size_t) { return std::size_t{0}; });
+    queue.add(
+        1, [](std::size_t) -> std::size_t { throw std::bad_alloc(); });
+    queue.add(1, [](std::size_t) { return std::size_t{0}; });
+
+    queue.takeFirst();
+    EXPECT_THROW(queue.takeFirst(), std::bad_alloc);
+    queue.takeFirst();
+}
+
+TEST_F(Parallel, DropsQueuedWorkThatIsGivenUp) {
+    std::atomic<int> begun{0}, done{0};
+    {
+        WorkQueue queue(10);
+        for (int i = 0; i < 100; ++i) {
+            queue.add(
+                1,
+                [&](std::size_t) {
+                    ++begun;
+                    std::this_thread::sleep_for(std::chrono::milliseconds(1));
+                    ++done;
+                    return std::size_t{0};
+                });
+        }
+    }
+    EXPECT_EQ(begun, done);
+    EXPECT_LT(done, 100);
+}
+
 } // namespace
 } // namespace fbxsdk::detail
