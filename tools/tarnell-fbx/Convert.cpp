@@ -8,6 +8,7 @@
 #include <fstream>
 #include <iostream>
 #include <memory>
+#include <optional>
 #include <set>
 #include <system_error>
 
@@ -60,30 +61,32 @@ public:
         info.setUseSampleFPS(mOptions.fps.has_value());
         if (mOptions.fps)
             info.setSampleFPS(*mOptions.fps);
-        if (!done(mReader.load(info)))
+        if (!done(mReader->load(info)))
             return false;
-        mLosses.addScene(*mReader.getScene());
-        mReader.setFrame(static_cast<float>(firstFrame()));
-        const bool complete = done(mReader.makeMeshes()) && readNodes() && readFurtherPoints();
+        mLosses.addScene(*mReader->getScene());
+        mReader->setFrame(static_cast<float>(firstFrame()));
+        const bool complete = done(mReader->makeMeshes()) && readNodes() && readFurtherPoints();
         addLosses();
+        keepTimes();
+        mMoving.clear();
+        mReader.reset(); // the scene that is written takes as much memory
         return complete;
     }
 
     /// False with the reason in lastError().
     bool write(const std::string& file) {
         mProgress.say("writing " + mOptions.output);
-        const FbxAnimStack* stack = mReader.getScene()->GetCurrentAnimationStack();
         TnFbxWriteInfo info;
         info.setFidelity(kFbxFidelityFaithful);
         info.setComputeCameraRotation(false); // the rotations that were read determine the cameras' directions
         info.setFileName(file);
-        info.setAnimationStackName(stack ? stack->GetName() : "");
+        info.setAnimationStackName(mStack);
         info.setFileFormat(mOptions.ascii);
         info.setCompatibilityVersion(static_cast<TnFbxWriteInfo::eCompatibilityVersion>(mOptions.version));
-        info.setFPS(static_cast<float>(mReader.getFrameRate()));
+        info.setFPS(static_cast<float>(mFrameRate));
         info.setAnimateMeshVertices(cachesPoints());
         info.setMayaVertexCacheFormat(mOptions.cache == PointCache::maya);
-        setSpan(info, stack);
+        setSpan(info);
         const bool written = done(Fbx().writeFile(info, mCameras.pointers, mLights.pointers, mTransforms.pointers,
                                                   mNulls.pointers, mMeshes.pointers));
         mProgress.hide();
@@ -100,7 +103,7 @@ private:
 
     [[nodiscard]] bool cachesPoints() const { return mOptions.frames && mOptions.cache != PointCache::none; }
     [[nodiscard]] long long firstFrame() const {
-        return mOptions.frames ? mOptions.frames->first : mReader.getFirstFrame();
+        return mOptions.frames ? mOptions.frames->first : mReader->getFirstFrame();
     }
 
     /// Records the call's warnings.
@@ -113,7 +116,7 @@ private:
 
     /// For each node the most specific object.
     bool readNodes() {
-        for (const TreeNode& entry : nodesInOrder(*mReader.getScene())) {
+        for (const TreeNode& entry : nodesInOrder(*mReader->getScene())) {
             FbxNode& node = *entry.node;
             if (entry.isDetached || isProducer(node) || isSkewHelper(node))
                 continue;
@@ -129,19 +132,19 @@ private:
         mBones += type == FbxNodeAttribute::eSkeleton ? 1 : 0;
         const bool isCamera = type == FbxNodeAttribute::eCamera || type == FbxNodeAttribute::eCameraStereo;
         if (isCamera && wants("cameras"))
-            return done(mReader.read(node, mCameras.add()));
+            return done(mReader->read(node, mCameras.add()));
         if (type == FbxNodeAttribute::eLight && wants("lights"))
-            return done(mReader.read(node, mLights.add()));
+            return done(mReader->read(node, mLights.add()));
         if (type == FbxNodeAttribute::eNull && wants("nulls"))
-            return done(mReader.read(node, mNulls.add()));
+            return done(mReader->read(node, mNulls.add()));
         if (type == FbxNodeAttribute::eMesh && wants("meshes"))
             return readMesh(node);
-        return !wants("transforms") || done(mReader.read(node, mTransforms.add()));
+        return !wants("transforms") || done(mReader->read(node, mTransforms.add()));
     }
 
     bool readMesh(FbxNode& node) {
         TnFbxMesh& mesh = mMeshes.add();
-        if (!done(mReader.read(node, mesh)))
+        if (!done(mReader->read(node, mesh)))
             return false;
         const bool deforms = node.GetGeometry()->GetDeformerCount() > 0;
         if (deforms || moves(mesh))
@@ -165,16 +168,16 @@ private:
         const long long last = cachesPoints() ? mOptions.frames->second : firstFrame();
         for (long long frame = firstFrame() + 1; frame <= last; ++frame) {
             mProgress.say("reading meshes, frame " + std::to_string(frame) + " of " + std::to_string(last));
-            mReader.setFrame(static_cast<float>(frame));
+            mReader->setFrame(static_cast<float>(frame));
             for (const auto& [node, mesh] : mMoving)
-                if (!done(mReader.readPoints(*node, *mesh)))
+                if (!done(mReader->readPoints(*node, *mesh)))
                     return false;
         }
         return true;
     }
 
     void addLosses() {
-        const bool still = !cachesPoints() && mReader.getFirstFrame() < mReader.getLastFrame();
+        const bool still = !cachesPoints() && mReader->getFirstFrame() < mReader->getLastFrame();
         mLosses.add(still ? mDeforming : 0, "written as at the first frame (see --frames): deforming meshes");
         mLosses.add(mSplit, "written as a copy for each node: deforming meshes that several nodes share");
         mLosses.add(mWithoutPolygons, "written as points: meshes without polygons");
@@ -187,26 +190,34 @@ private:
         }
     }
 
+    /// What the written file states about time.
+    void keepTimes() {
+        const FbxAnimStack* stack = mReader->getScene()->GetCurrentAnimationStack();
+        mFrameRate = mReader->getFrameRate();
+        mStack = stack ? stack->GetName() : "";
+        const FbxTimeSpan span = stack ? stack->GetLocalTimeSpan() : FbxTimeSpan();
+        if (span.GetStart() < span.GetStop()) // else the keys determine its length
+            mSpan = {frameOf(span.GetStart()), frameOf(span.GetStop())};
+    }
+
+    [[nodiscard]] float frameOf(FbxTime time) const { return static_cast<float>(time.GetSecondDouble() * mFrameRate); }
+
     /// The span of the stack, to the fraction of a frame, or the frames of the point caches.
-    void setSpan(TnFbxWriteInfo& info, const FbxAnimStack* stack) const {
+    void setSpan(TnFbxWriteInfo& info) const {
         if (mOptions.frames) {
             info.setStartFrame(static_cast<float>(mOptions.frames->first));
             info.setEndFrame(static_cast<float>(mOptions.frames->second));
-            return;
+        } else if (mSpan) {
+            info.setStartFrame(mSpan->first);
+            info.setEndFrame(mSpan->second);
         }
-        const FbxTimeSpan span = stack ? stack->GetLocalTimeSpan() : FbxTimeSpan();
-        if (!(span.GetStart() < span.GetStop()))
-            return; // the keys determine its length
-        info.setStartFrame(frameOf(span.GetStart()));
-        info.setEndFrame(frameOf(span.GetStop()));
-    }
-
-    [[nodiscard]] float frameOf(FbxTime time) const {
-        return static_cast<float>(time.GetSecondDouble() * mReader.getFrameRate());
     }
 
     const ConvertOptions& mOptions;
-    FbxFaithful mReader;
+    std::optional<FbxFaithful> mReader{std::in_place}; ///< until all is read
+    std::string mStack;
+    double mFrameRate = 0.0;
+    std::optional<std::pair<float, float>> mSpan;
     Progress mProgress;
     Objects<TnFbxCamera> mCameras;
     Objects<TnFbxLight> mLights;

@@ -4,6 +4,7 @@
 // Property handles: look-up, values, flags, compounds and connections.
 #include <fbxsdk/FbxProperty.h>
 
+#include <cstring>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -57,6 +58,14 @@ FbxProperty compoundOf(const FbxProperty& property) {
 }
 
 PropertyData& editable(FbxProperty& property) { return property.GetFbxObject()->data().materialise(property.index()); }
+
+/// Whether the value is the row's default, to the bit.
+bool keepsDefault(const PropertyRow& row, const void* value, EFbxType type) {
+    const detail::PropertyValue unset = detail::defaultValue(row);
+    detail::PropertyValue set = unset;
+    return detail::writePropertyValue(set, row.type->GetType(), value, type) && set.integer == unset.integer &&
+           std::memcmp(set.numbers.data(), unset.numbers.data(), sizeof set.numbers) == 0 && set.text == unset.text;
+}
 
 /// The first property from the index on that belongs to the compound, or to none when that is invalid.
 FbxProperty nextBelow(FbxObject& object, const FbxProperty& compound, int from) {
@@ -146,13 +155,15 @@ void FbxProperty::readValue(void* pValue, EFbxType pType) const {
 bool FbxProperty::writeValue(const void* pValue, EFbxType pType) {
     if (!exists(*this))
         return false;
-    if (!detail::isWritable(GetPropertyDataType().GetType(), pType))
+    const EFbxType type = GetPropertyDataType().GetType();
+    if (!detail::isWritable(type, pType))
         return false;
-    PropertyData& stored = editable(*this);
-    if (!detail::writePropertyValue(stored.value, stored.type.GetType(), pValue, pType))
-        return false;
-    ++mObject->GetFbxManager()->data().revision;
-    return true;
+    // The default of a property that is not stored need not be.
+    const bool isWritten = (!dataOf(*this) && keepsDefault(*rowOf(*this), pValue, pType)) ||
+                           detail::writePropertyValue(editable(*this).value, type, pValue, pType);
+    if (isWritten)
+        ++mObject->GetFbxManager()->data().revision;
+    return isWritten;
 }
 
 void FbxProperty::ModifyFlag(FbxPropertyFlags::EFlags pFlag, bool pValue) {

@@ -26,6 +26,9 @@
 #include <fbxsdk/FbxVideo.h>
 
 #include "ExportFixture.h"
+#include "io/SchemaClass.h"
+#include "object/ManagerData.h"
+#include "schema/Schema.h"
 
 namespace {
 
@@ -680,6 +683,22 @@ TEST_P(SceneWriting, WritesATreeOfAThousandLevels) {
     for (FbxNode* node = copy->GetRootNode(); node->GetChildCount() > 0; node = node->GetChild(0))
         ++depth;
     EXPECT_EQ(depth, 1000);
+}
+
+TEST_P(SceneWriting, WritesAPropertyThatIsStoredWithItsDefaultLikeOneThatWasNeverSet) {
+    setenv("SOURCE_DATE_EPOCH", "1585690463", 1);
+    std::vector<FbxObject*> objects;
+    for (const detail::SchemaClass& row : detail::schemaClasses())
+        if (row.info->construct)
+            objects.push_back(detail::ManagerData::createObject(scene, row.classId(), "object"));
+    const std::string untouched = write();
+
+    for (FbxObject* object : objects)
+        for (const detail::PropertyRow& row : object->data().info->rows)
+            object->data().materialise(detail::rowIndex(object->data().info->rows, row.name));
+
+    EXPECT_TRUE(write() == untouched);
+    unsetenv("SOURCE_DATE_EPOCH");
 }
 
 } // namespace
