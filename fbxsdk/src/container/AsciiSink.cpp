@@ -57,8 +57,8 @@ char* printNumber(char* place, Number value) {
 
 /// Elements separated by commas. A comma behind the last one, too, when others follow.
 template <class Number>
-std::string elementsText(std::span<const Number> values, bool othersFollow) {
-    std::string text(values.size() * (kMostDigits + 1), '\0');
+void printElements(std::string& text, std::span<const Number> values, bool othersFollow) {
+    text.resize(values.size() * (kMostDigits + 1));
     char* end = text.data();
     for (const Number value : values) {
         end = printNumber(end, value);
@@ -67,7 +67,6 @@ std::string elementsText(std::span<const Number> values, bool othersFollow) {
     if (!othersFollow)
         --end;
     text.resize(static_cast<std::size_t>(end - text.data()));
-    return text;
 }
 
 /// Appends elements, and breaks the line behind the first comma beyond the length of one. `line` is the length of the
@@ -99,6 +98,7 @@ void eachPiece(std::span<const Number> values, const Use& use) {
 } // namespace
 
 AsciiSink::AsciiSink(ByteOutput& output, std::uint32_t version) : mOutput(output), mVersion(version) {
+    mText.reserve(2 * kFlushBytes);
     const std::uint32_t digits[] = {version / 1000, version / 100 % 10, version / 10 % 10};
     mText = "; FBX ";
     for (const std::uint32_t digit : digits)
@@ -137,12 +137,12 @@ void AsciiSink::flush() {
 
 /// Writes the first pending piece of an array and what follows it.
 void AsciiSink::settleFirst() {
-    const std::unique_ptr<PendingArray> first = mPending.takeFirst();
+    const PendingArray first = mPending.takeFirst();
     mLines.clear();
-    appendLines(mLines, first->bytes, mPendingLine);
+    appendLines(mLines, first.bytes, mPendingLine);
     mOutput.write(mLines);
-    mOutput.write(first->after);
-    if (!first->bytes.ends_with(',')) // the end of the array
+    mOutput.write(first.after);
+    if (!first.bytes.ends_with(',')) // the end of the array
         mPendingLine = 0;
 }
 
@@ -264,7 +264,8 @@ template <class Number>
 void AsciiSink::writeElements(std::span<const Number> values) {
     std::size_t line = 0;
     eachPiece(values, [&](std::span<const Number> piece, bool othersFollow) {
-        appendLines(mText, elementsText(piece, othersFollow), line);
+        printElements(mElements, piece, othersFollow);
+        appendLines(mText, mElements, line);
         flushWhenLong();
     });
 }
@@ -279,7 +280,9 @@ void AsciiSink::passElements(std::span<const Number> values) {
             mPending.add(
                 piece.size() * kMostDigits,
                 [copy = std::vector<Number>(piece.begin(), piece.end()), othersFollow](std::size_t) {
-                    return elementsText(std::span<const Number>(copy), othersFollow);
+                    std::string text;
+                    printElements(text, std::span<const Number>(copy), othersFollow);
+                    return text;
                 });
         });
 }

@@ -85,8 +85,8 @@ private:
     std::string mText;          ///< not passed on yet, behind the pending arrays
     std::size_t mLineStart = 0; ///< of the line being written, within mText
     PendingArrays mPending;
-    std::string mLines;           ///< reused for each pending piece
-    std::size_t mPendingLine = 0; ///< length of the last line of the pieces that are written
+    std::string mElements, mLines; ///< reused for each piece of an array
+    std::size_t mPendingLine = 0;  ///< length of the last line of the pieces that are written
 };
 
 } // namespace detail

@@ -197,11 +197,11 @@ void BinarySink::patchHead(const RecordPlace& record, std::uint64_t end, std::ui
 
 /// Writes the first pending array and what follows it.
 void BinarySink::settleFirst() {
-    const std::unique_ptr<PendingArray> first = mPending.takeFirst();
-    mWindow.write(first->bytes);
+    const PendingArray first = mPending.takeFirst();
+    mWindow.write(first.bytes);
     const std::uint64_t base = mWindow.size();
-    mWindow.write(first->after);
-    for (const RecordMark& mark : first->marks)
+    mWindow.write(first.after);
+    for (const RecordMark& mark : first.marks)
         apply(mark, base);
 }
 

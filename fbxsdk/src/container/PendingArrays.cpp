@@ -24,8 +24,7 @@ std::size_t PendingArrays::workers() {
 }
 
 void PendingArrays::add(std::size_t size, Encode encode) {
-    mArrays.push_back(std::make_unique<PendingArray>());
-    PendingArray& array = *mArrays.back();
+    PendingArray& array = mArrays.emplace_back();
     mQueue->add(size, [&array, encode = std::move(encode)](std::size_t worker) {
         array.bytes = encode(worker);
         return array.bytes.size();
@@ -44,9 +43,9 @@ bool PendingArrays::isFirstDue() {
     return true;
 }
 
-std::unique_ptr<PendingArray> PendingArrays::takeFirst() {
+PendingArray PendingArrays::takeFirst() {
     mQueue->takeFirst();
-    std::unique_ptr<PendingArray> first = std::move(mArrays.front());
+    PendingArray first = std::move(mArrays.front());
     mArrays.pop_front();
     return first;
 }

@@ -5,8 +5,8 @@
 #pragma once
 
 #include <cstdint>
-#include <deque>
 #include <functional>
+#include <list>
 #include <memory>
 #include <string>
 #include <vector>
@@ -26,8 +26,8 @@ struct RecordMark {
 
 /// An array and what follows it up to the next one.
 struct PendingArray {
-    std::string bytes; ///< of the array, when it is encoded
-    std::string after;
+    std::string bytes{}; ///< of the array, when it is encoded
+    std::string after{};
     std::vector<RecordMark> marks{}; ///< within the bytes after the array, in order
 };
 
@@ -44,17 +44,17 @@ public:
 
     [[nodiscard]] bool isEmpty() const { return mArrays.empty(); }
     /// The array that was added last.
-    [[nodiscard]] PendingArray& last() { return *mArrays.back(); }
+    [[nodiscard]] PendingArray& last() { return mArrays.back(); }
     /// Adds an array of that size in bytes.
     void add(std::size_t size, Encode encode);
 
     /// Whether the first array must be written before another is added, or can be without waiting.
     [[nodiscard]] bool isFirstDue();
     /// Removes the first array, encoded. Rethrows what its encoding threw.
-    [[nodiscard]] std::unique_ptr<PendingArray> takeFirst();
+    [[nodiscard]] PendingArray takeFirst();
 
 private:
-    std::deque<std::unique_ptr<PendingArray>> mArrays;
+    std::list<PendingArray> mArrays;
     std::unique_ptr<WorkQueue> mQueue; ///< the last member: its threads use the arrays
 };
 

@@ -8,10 +8,14 @@
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
 
-void WrittenLines::fill(const DocumentObject& object) {
+void WrittenLines::clear() {
     mLines.clear();
     mOwn.reuse();
     mValues.reuse();
+}
+
+void WrittenLines::fill(const DocumentObject& object) {
+    clear();
     for (const DocumentProperty& property : object.properties)
         refer(property);
     if (object.content->properties)

@@ -5,7 +5,7 @@
 #pragma once
 
 #include <array>
-#include <deque>
+#include <memory>
 #include <span>
 #include <string_view>
 #include <vector>
@@ -31,6 +31,7 @@ struct WrittenLine {
 /// The lines of one object in file order. Their memory serves the next object.
 class WrittenLines {
 public:
+    void clear();
     /// Replaces the lines by those of the object.
     void fill(const DocumentObject& object);
 
@@ -60,11 +61,18 @@ private:
     template <class T>
     class Pool {
     public:
-        [[nodiscard]] T& next() { return mUsed++ < mElements.size() ? mElements[mUsed - 1] : mElements.emplace_back(); }
+        [[nodiscard]] T& next() {
+            if (mUsed == kBlock * mBlocks.size())
+                mBlocks.push_back(std::make_unique<T[]>(kBlock));
+            T& element = mBlocks[mUsed / kBlock][mUsed % kBlock];
+            ++mUsed;
+            return element;
+        }
         void reuse() { mUsed = 0; }
 
     private:
-        std::deque<T> mElements;
+        static constexpr std::size_t kBlock = 64;
+        std::vector<std::unique_ptr<T[]>> mBlocks;
         std::size_t mUsed = 0;
     };
 

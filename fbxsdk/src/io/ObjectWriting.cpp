@@ -28,7 +28,6 @@
 
 #include "animation/CurveEvaluation.h"
 #include "document/RecordWriting.h"
-#include "document/WrittenLines.h"
 #include "geometry/GeometryWriting.h"
 #include "object/SceneMembers.h"
 #include "schema/Spellings.h"

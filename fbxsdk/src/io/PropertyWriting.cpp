@@ -10,7 +10,6 @@
 
 #include <fbxsdk/FbxAnimCurveNode.h>
 
-#include "document/WrittenLines.h"
 #include "scene/IdleCurveNode.h"
 #include "schema/PropertyFlags.h"
 #include "schema/PropertyTypes.h"
@@ -142,16 +141,15 @@ const DefaultLines& ClassOutputs::defaultsOf(std::span<const PropertyRow> rows) 
         return defaults;
     defaults.firstNumber = mNextNumber;
     mNextNumber += static_cast<int>(rows.size());
-    WrittenLines values;
+    mLines.clear();
     for (const PropertyRow& row : rows) {
         const FbxDataType& type = *row.type;
-        const PropertyValue value = defaultValue(row);
-        std::span<const Value> stored = valuesOf(type, value, values);
-        if (!stored.empty() && stored[0].type == Value::Type::text)
-            stored = values.keep(Value::ofText(row.text));
-        values.add({row.name, type.info()->typeName, type.info()->subTypeName, row.flags, stored});
+        std::span<const Value> values = valuesOf(type, defaultValue(row), mLines);
+        if (!values.empty() && values[0].type == Value::Type::text)
+            values = mLines.keep(Value::ofText(row.text)); // the other one is gone
+        mLines.add({row.name, type.info()->typeName, type.info()->subTypeName, row.flags, values});
     }
-    defaults.lines = values.kept(mTree);
+    defaults.lines = mLines.kept(mTree);
     return defaults;
 }
 

@@ -19,7 +19,6 @@
 #include <fbxsdk/FbxNode.h>
 #include <fbxsdk/FbxScene.h>
 
-#include "document/WrittenLines.h"
 #include "object/SceneMembers.h"
 #include "scene/IdleCurveNode.h"
 #include "scene/SceneData.h"

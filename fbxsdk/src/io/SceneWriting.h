@@ -9,7 +9,7 @@
 #include <unordered_map>
 #include <vector>
 
-#include "document/Document.h"
+#include "document/WrittenLines.h"
 #include "io/SchemaClass.h"
 #include "object/ObjectData.h"
 #include "schema/VersionTraits.h"
@@ -82,6 +82,7 @@ private:
     RecordTree& mTree;
     CommonTexts mTexts;
     PropertyChoice mChoice;
+    WrittenLines mLines; ///< of the class that is added
     int mNextNumber = 0;
     std::unordered_map<const PropertyRow*, DefaultLines> mDefaults;
     std::unordered_map<const ClassInfo*, ClassOutput> mClasses;
