@@ -32,9 +32,10 @@ bool has(const FbxMesh& mesh, FbxLayerElement::EType type) { return mesh.GetLaye
 bool isHidden(FbxNode& node) { return node.Visibility.Get() == 0.0 || isAnimated(node.Visibility); }
 
 bool hasOwnProperties(const FbxObject& object) {
-    const std::vector<FbxProperty> properties = propertiesOf(object);
-    return std::any_of(properties.begin(), properties.end(),
-                       [](const FbxProperty& property) { return property.GetFlag(FbxPropertyFlags::eUserDefined); });
+    for (FbxProperty each = object.GetFirstProperty(); each.IsValid(); each = object.GetNextProperty(each))
+        if (each.GetFlag(FbxPropertyFlags::eUserDefined))
+            return true;
+    return false;
 }
 
 /// Properties of lights that are written with the values of a new light.
