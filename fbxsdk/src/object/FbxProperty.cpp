@@ -4,7 +4,9 @@
 // Property handles: look-up, values, flags, compounds and connections.
 #include <fbxsdk/FbxProperty.h>
 
-#include <cstring>
+#include <algorithm>
+#include <bit>
+#include <cstdint>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -63,8 +65,12 @@ PropertyData& editable(FbxProperty& property) { return property.GetFbxObject()->
 bool keepsDefault(const PropertyRow& row, const void* value, EFbxType type) {
     const detail::PropertyValue unset = detail::defaultValue(row);
     detail::PropertyValue set = unset;
+    const auto sameBits = [](double a, double b) {
+        return std::bit_cast<std::uint64_t>(a) == std::bit_cast<std::uint64_t>(b);
+    };
     return detail::writePropertyValue(set, row.type->GetType(), value, type) && set.integer == unset.integer &&
-           std::memcmp(set.numbers.data(), unset.numbers.data(), sizeof set.numbers) == 0 && set.text == unset.text;
+           std::equal(set.numbers.begin(), set.numbers.end(), unset.numbers.begin(), sameBits) &&
+           set.text == unset.text;
 }
 
 /// The first property from the index on that belongs to the compound, or to none when that is invalid.
