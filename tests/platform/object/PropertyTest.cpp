@@ -3,6 +3,7 @@
 //
 // Properties: look-up, dynamic and compound ones, flags, labels and connections. Values by type are tested with the
 // conversions.
+#include <cmath>
 #include <string>
 #include <vector>
 
@@ -426,6 +427,19 @@ TEST_F(FbxPropertyTest, GivesTheNumberOfAnEnumeration) {
     EXPECT_EQ(light->LightType.Get(), FbxLight::eSpot);
     EXPECT_EQ(light->FindProperty("LightType").Get<FbxEnum>(), 2);
     EXPECT_EQ(light->FindProperty("LightType").Get<FbxDouble>(), 2.0);
+}
+
+TEST_F(FbxPropertyTest, StoresNothingForADefaultThatIsSet) {
+    const std::size_t stored = node->data().properties().size();
+    const FbxDouble3 translation = node->LclTranslation.Get();
+
+    node->LclTranslation.Set(translation);
+    EXPECT_EQ(node->data().properties().size(), stored);
+
+    node->LclTranslation.Set(FbxDouble3(-0.0, 0.0, 0.0));
+    EXPECT_EQ(node->data().properties().size(), stored + 1) << "minus zero is another value";
+    node->LclTranslation.Set(translation);
+    EXPECT_FALSE(std::signbit(node->LclTranslation.Get()[0]));
 }
 
 } // namespace
