@@ -51,6 +51,23 @@ TEST(JsonWriter, EscapesKeysAndTexts) {
     EXPECT_EQ(out.str(), "{\"a\\\"b\":\"\\u007f\\n\\u0085\\\\\",\"\xEF\xBF\xBD\":null}");
 }
 
+TEST(JsonWriter, WritesMembersInFrontOfAKey) {
+    std::ostringstream out;
+    JsonWriter json(out, false);
+    const JsonKey key("c", "\"a\":1,\"b\":2,");
+    json.beginArray();
+    for (int i = 0; i < 2; ++i) {
+        json.beginObject();
+        json.key("v");
+        json.integer(i);
+        json.key(key);
+        json.integer(3);
+        json.endObject();
+    }
+    json.endArray();
+    EXPECT_EQ(out.str(), "[{\"v\":0,\"a\":1,\"b\":2,\"c\":3},{\"v\":1,\"a\":1,\"b\":2,\"c\":3}]");
+}
+
 TEST(JsonWriter, WritesTextsOfAnySizeAcrossItsBlocks) {
     std::string expected = "[";
     std::ostringstream out;

@@ -31,13 +31,6 @@ bool has(const FbxMesh& mesh, FbxLayerElement::EType type) { return mesh.GetLaye
 
 bool isHidden(FbxNode& node) { return node.Visibility.Get() == 0.0 || isAnimated(node.Visibility); }
 
-bool hasOwnProperties(const FbxObject& object) {
-    for (FbxProperty each = object.GetFirstProperty(); each.IsValid(); each = object.GetNextProperty(each))
-        if (each.GetFlag(FbxPropertyFlags::eUserDefined))
-            return true;
-    return false;
-}
-
 /// Properties of lights that are written with the values of a new light.
 struct LightExtra {
     const char* what;
@@ -126,7 +119,7 @@ struct NodeCounts {
         const FbxNode* parent = node.GetParent();
         parents += parent && parent->GetParent() && !isSkewHelper(*parent) ? 1 : 0;
         hidden += isHidden(node) ? 1 : 0;
-        ownProperties += hasOwnProperties(node) ? 1 : 0;
+        ownProperties += extensions::hasUserDefinedProperties(node) ? 1 : 0;
         if (attribute && isOfKind) {
             shared += seen.insert(attribute).second || attribute->Is<FbxMesh>() ? 0 : 1;
             add(*attribute);

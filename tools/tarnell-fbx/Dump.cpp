@@ -3,16 +3,20 @@
 //
 // tarnell-fbx dump: the library's value objects as JSON.
 #include <algorithm>
+#include <cmath>
 #include <functional>
 #include <iostream>
 #include <memory>
 #include <optional>
+#include <string>
+#include <string_view>
 #include <type_traits>
 #include <utility>
 #include <vector>
 
 #include "Commands.h"
 #include "FileFacts.h"
+#include "FloatText.h"
 #include "JsonWriter.h"
 #include "StandardInput.h"
 
@@ -153,6 +157,12 @@ private:
         mJson.beginObject();
         mJson.key(kValue);
         mJson.real(channel.getValue());
+        if (mSamples && !mJson.breaksLines() && std::isfinite(time.getFrameRate())) {
+            mJson.key(samplesKey(time));
+            printSamples(channel, time);
+            mJson.endObject();
+            return;
+        }
         mJson.key(kStart);
         mJson.integer(time.getStartFrame());
         mJson.key(kEnd);
@@ -161,11 +171,32 @@ private:
         mJson.real(time.getFrameRate());
         if (mSamples) {
             mJson.key(kSamples);
-            mJson.beginArray();
-            samples(channel, time.getStartFrame(), time.getEndFrame());
-            mJson.endArray();
+            printSamples(channel, time);
         }
         mJson.endObject();
+    }
+
+    /// The key of the samples, with the span and the rate in front of it: nearly all channels have the same ones.
+    const JsonKey& samplesKey(const TnFbxTime& time) {
+        const auto isSame = [&](const TnFbxTime& other) {
+            return time.getStartFrame() == other.getStartFrame() && time.getEndFrame() == other.getEndFrame() &&
+                   std::equal_to<float>()(time.getFrameRate(), other.getFrameRate());
+        };
+        if (!mSamplesKey || !isSame(mSamplesTime)) {
+            char rate[kFloatRoom];
+            const std::string_view rateText(rate, writeShortest(rate, time.getFrameRate()));
+            mSamplesKey.emplace("samples", "\"start\":" + std::to_string(time.getStartFrame()) +
+                                               ",\"end\":" + std::to_string(time.getEndFrame()) +
+                                               ",\"rate\":" + std::string(rateText) + ',');
+            mSamplesTime = time;
+        }
+        return *mSamplesKey;
+    }
+
+    void printSamples(const TnFbxChannel& channel, const TnFbxTime& time) {
+        mJson.beginArray();
+        samples(channel, time.getStartFrame(), time.getEndFrame());
+        mJson.endArray();
     }
 
     void samples(const TnFbxChannel& channel, long long first, long long last) {
@@ -207,6 +238,8 @@ private:
 
     JsonWriter& mJson;
     bool mSamples;
+    std::optional<JsonKey> mSamplesKey;
+    TnFbxTime mSamplesTime; ///< of the key
 };
 
 /// One file, loaded once, and all queries to it.

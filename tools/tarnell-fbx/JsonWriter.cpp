@@ -51,7 +51,7 @@ std::string escaped(std::string_view value) {
 
 } // namespace
 
-JsonKey::JsonKey(std::string_view name) : mQuoted(escaped(name)) {}
+JsonKey::JsonKey(std::string_view name, std::string_view before) : mQuoted(std::string(before) + escaped(name)) {}
 
 void JsonWriter::text(std::string_view value) {
     if (!isPlain(value))

@@ -20,7 +20,8 @@ namespace tool {
 /// A key that is written many times: escaped once.
 class JsonKey {
 public:
-    explicit JsonKey(std::string_view name);
+    /// `before` is the text of other members in front of it, without line breaks and with a comma behind each.
+    explicit JsonKey(std::string_view name, std::string_view before = {});
 
 private:
     friend class JsonWriter;
@@ -54,6 +55,7 @@ public:
     }
     void text(std::string_view value);
     void null() { raw("null"); }
+    [[nodiscard]] bool breaksLines() const { return mPretty; }
     void boolean(bool value) { raw(value ? "true" : "false"); }
     void integer(long long value) { number(value); }
     /// A number that is already formatted; null for what is no JSON number (NaN and infinities).

@@ -5,6 +5,7 @@
 #include <memory>
 #include <string>
 
+#include <fbxsdk.h>
 #include <fbxsdk/extensions/FileFacts.h>
 
 #include "io/SceneReading.h"
@@ -48,6 +49,29 @@ TEST_F(FileFactsTest, ACustomFrameRateThatIsAssumedIsNotStated) {
         readSettings(timeMode(FbxTime::eCustom) + rate);
         EXPECT_FALSE(extensions::statesFrameRate(*scene)) << rate;
     }
+}
+
+TEST_F(FileFactsTest, UserDefinedPropertiesAreThoseWithTheFlag) {
+    FbxNode* const node = FbxNode::Create(scene, "n");
+    FbxProperty own = FbxProperty::Create(node, FbxDoubleDT, "own");
+    node->LclTranslation.Set(FbxDouble3(1, 2, 3));
+    EXPECT_FALSE(extensions::hasUserDefinedProperties(*node));
+    own.ModifyFlag(FbxPropertyFlags::eUserDefined, true);
+    EXPECT_TRUE(extensions::hasUserDefinedProperties(*node));
+    own.ModifyFlag(FbxPropertyFlags::eUserDefined, false);
+    node->Visibility.ModifyFlag(FbxPropertyFlags::eUserDefined, true);
+    EXPECT_TRUE(extensions::hasUserDefinedProperties(*node)) << "a property of the class may have it, too";
+}
+
+/// hasUserDefinedProperties relies on it.
+TEST_F(FileFactsTest, NewObjectsHaveNoUserDefinedProperty) {
+    for (FbxObject* object :
+         {static_cast<FbxObject*>(FbxNode::Create(scene, "n")), static_cast<FbxObject*>(FbxCamera::Create(scene, "c")),
+          static_cast<FbxObject*>(FbxLight::Create(scene, "l")),
+          static_cast<FbxObject*>(FbxSurfacePhong::Create(scene, "p")),
+          static_cast<FbxObject*>(&scene->GetGlobalSettings())})
+        for (FbxProperty each = object->GetFirstProperty(); each.IsValid(); each = object->GetNextProperty(each))
+            EXPECT_FALSE(each.GetFlag(FbxPropertyFlags::eUserDefined)) << each.GetNameAsCStr();
 }
 
 } // namespace

@@ -24,6 +24,9 @@ namespace extensions {
 /// animated. Otherwise it has the default of its class. False for an invalid property.
 [[nodiscard]] FBXSDK_DLL bool isStated(const FbxProperty& property);
 
+/// Whether any property of the object has the flag `eUserDefined`, without a look at each of them.
+[[nodiscard]] FBXSDK_DLL bool hasUserDefinedProperties(const FbxObject& object);
+
 /// Whether the file that was read into the scene states a frame rate: its time mode is not the application's default,
 /// and a custom one comes with a rate. The rate of another custom one is derived from the times of the file, or
 /// assumed. False for a scene that was made in memory.
