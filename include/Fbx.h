@@ -95,15 +95,4 @@ public:
                    const std::vector<TnFbxNull*>& nulls, const std::vector<TnFbxMesh*>& meshes) const;
 };
 
-/// How many threads the calls of the process may use at most: initially 1, the caller's own, or the value of
-/// TARNELL_FBX_THREADS in the environment.
-TARNELL_FBX_API int maximumThreads();
-
-/// 0 is as many threads as the machine has; less counts as 1. The arrays of large meshes are then deflated and inflated
-/// on several threads, and long lists of ASCII files parsed. Threads start and end within the call that uses them; only
-/// while a scene stays loaded, as that of an `FbxFaithful`, they may continue to inflate for a short time after it.
-/// Concurrent calls share them. What is read and written is the same for every number. Any thread may call this at any
-/// time; a call in progress may keep the previous number.
-TARNELL_FBX_API void setMaximumThreads(int count);
-
 } // namespace Tarnell::Fbx

@@ -3,7 +3,7 @@
 //
 // The number of threads that a call may use. Only the bundled platform supports it: with another one the number is
 // stored without effect.
-#include "Fbx.h"
+#include "TnFbxLimits.h"
 
 #ifdef TARNELL_FBX_EXTERNAL_FBXSDK
 #include <algorithm>

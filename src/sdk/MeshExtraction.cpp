@@ -4,6 +4,8 @@
 // A mesh at one frame: layout, points, and the values of its layers at every corner of its polygons.
 #include "FbxSdk.h"
 
+#include "TnFbxLimits.h"
+
 #include "LayerReading.h"
 #include "PropertySampling.h"
 #include "ReadScope.h"
@@ -227,10 +229,15 @@ void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, int co
         fillLayout(source, cornerCount, arrays);
     bool normals = false, uvs = isAlike && mesh.getValidUVs();
     if (fbxsdk::FbxLayer* first = source.GetLayer(0)) {
-        const detail::CornerValues<fbxsdk::FbxVector4> stored = detail::layerNormals(*first); // throws without any
-        // They come last: where another thread inflates them, they are ready last, too.
+        const detail::CornerValues<fbxsdk::FbxVector4> stored = detail::layerNormals(*first); // throws where it has no array
+        // The largest array, which takes the least memory as the first one. But where another thread inflates it, it is
+        // ready last.
+        const bool normalsFirst = maximumThreads() == 1;
+        if (normalsFirst)
+            normals = fillNormals(source, stored, bake, cornerCount, arrays);
         uvs = isAlike ? uvs : fillUVs(source, *first, cornerCount, arrays);
-        normals = fillNormals(source, stored, bake, cornerCount, arrays);
+        if (!normalsFirst)
+            normals = fillNormals(source, stored, bake, cornerCount, arrays);
     }
     const bool colours = fillColours(source, arrays);
     // At the end: if a damaged layer leaves the mesh partly filled, nothing is valid.
