@@ -11,7 +11,7 @@ namespace detail {
 namespace {
 
 /// For each thread: what waits to be encoded or to be written.
-constexpr std::size_t kMostPendingBytes = std::size_t{16} << 20;
+constexpr std::size_t kMostPendingBytes = std::size_t{4} << 20;
 
 } // namespace
 
