@@ -13,7 +13,7 @@ endfunction()
 # Sources with a name that another source of their folder uses for something else; and what only the tool has.
 set(tarnell_compiled_alone
   animation/FrameRateOfTimes cache/PointCache2 container/BinaryReader core/FbxTime document/ValueCounts
-  faithful/CameraReading faithful/PlacementWriting geometry/LayerWriting model/TnFbxLight model/TnFbxMarker
+  faithful/CameraReading faithful/PlacementWriting faithful/Shear geometry/LayerWriting model/TnFbxLight model/TnFbxMarker
   legacy/TakeWriting
   sdk/PropertySampling tarnell-fbx/main)
 
