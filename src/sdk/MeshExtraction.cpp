@@ -229,7 +229,8 @@ void fillCorners(fbxsdk::FbxMesh& source, const fbxsdk::FbxAMatrix* bake, int co
         fillLayout(source, cornerCount, arrays);
     bool normals = false, uvs = isAlike && mesh.getValidUVs();
     if (fbxsdk::FbxLayer* first = source.GetLayer(0)) {
-        const detail::CornerValues<fbxsdk::FbxVector4> stored = detail::layerNormals(*first); // throws where it has no array
+        const detail::CornerValues<fbxsdk::FbxVector4> stored =
+            detail::layerNormals(*first); // throws where it has no array
         // The largest array, which takes the least memory as the first one. But where another thread inflates it, it is
         // ready last.
         const bool normalsFirst = maximumThreads() == 1;
@@ -317,7 +318,7 @@ void FbxSdk::setControlPoints(TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::Fb
         if (!isDeformed)
             detail::forEachControlPoint(source, first, size, put);
         for (int i = 0; isDeformed && i < size; ++i)
-            put(i, deformed[static_cast<std::size_t>(first + i)]);
+            put(i, deformed[static_cast<std::size_t>(first) + static_cast<std::size_t>(i)]);
         arrays.addControlPoints(points.data(), static_cast<std::size_t>(size));
     }
 }
