@@ -8,6 +8,8 @@
 #include <atomic>
 #include <cerrno>
 #include <cstddef>
+#include <fstream>
+#include <string>
 
 #if __has_include(<valgrind/callgrind.h>)
 #include <valgrind/callgrind.h>
@@ -61,6 +63,14 @@ void free(void* memory) { __libc_free(memory); }
 namespace bench {
 
 std::uint64_t allocationCount() { return allocations.load(std::memory_order_relaxed); }
+
+long long peakKilobytes() {
+    std::ifstream status("/proc/self/status");
+    for (std::string line; std::getline(status, line);)
+        if (line.rfind("VmHWM:", 0) == 0)
+            return std::stoll(line.substr(6));
+    return 0;
+}
 
 CountedInstructions::CountedInstructions() { CALLGRIND_START_INSTRUMENTATION; }
 

@@ -41,6 +41,10 @@ struct Cost {
 /// (Allocations.cpp).
 std::uint64_t allocationCount();
 
+/// The most resident memory that the program has had, in KiB. What the system reports to the parent of a process
+/// includes that of the parent when it started the process. 0 where /proc does not have it.
+long long peakKilobytes();
+
 /// From here to the end of the scope, valgrind's callgrind counts instructions; without it there is no effect.
 class CountedInstructions {
 public:
@@ -76,8 +80,8 @@ Cost measure(const Work& work) {
 inline Cost cheaper(const Cost& a, const Cost& b) { return a.seconds <= b.seconds ? a : b; }
 
 inline void print(const Cost& cost) {
-    std::printf("\"seconds\": %.6f, \"allocations\": %llu}\n", cost.seconds,
-                static_cast<unsigned long long>(cost.allocations));
+    std::printf("\"seconds\": %.6f, \"allocations\": %llu, \"peakKilobytes\": %lld}\n", cost.seconds,
+                static_cast<unsigned long long>(cost.allocations), peakKilobytes());
 }
 
 inline void print(const Answer& answer, const Cost& cost) {

@@ -106,17 +106,15 @@ class Run:
 def run(program: Path, mode: str, file: Path, *more: str, quiet: bool = False, threads: int = 1) -> Run | None:
     """One process: its result, its own time, and its peak of resident memory. None, when quiet, for a file
     that it refuses."""
-    process = subprocess.Popen([program, mode, file, *more], stdout=subprocess.PIPE, text=True,
-                               stderr=subprocess.DEVNULL if quiet else None,
-                               env=dict(os.environ, TARNELL_FBX_THREADS=str(threads)))
-    output = process.stdout.read()
-    _, status, usage = os.wait4(process.pid, 0)
-    if status != 0 and quiet:
+    process = subprocess.run([program, mode, file, *more], stdout=subprocess.PIPE, text=True, check=False,
+                             stderr=subprocess.DEVNULL if quiet else None,
+                             env=dict(os.environ, TARNELL_FBX_THREADS=str(threads)))
+    if process.returncode != 0 and quiet:
         return None
-    if status != 0:
+    if process.returncode != 0:
         sys.exit(f"{program.name} {mode} {file.name} failed")
-    answer = json.loads(output)
-    return Run(answer, answer.pop("seconds"), answer.pop("allocations"), usage.ru_maxrss / 1024)
+    answer = json.loads(process.stdout)
+    return Run(answer, answer.pop("seconds"), answer.pop("allocations"), answer.pop("peakKilobytes") / 1024)
 
 
 def prove_equal(title: str, ours: dict, theirs: dict) -> None:
