@@ -12,6 +12,7 @@
 
 #include <fbxsdk/extensions/Threads.h>
 
+#include "container/NumberBlocks.h"
 #include "container/NumberText.h"
 #include "core/Parallel.h"
 
@@ -45,9 +46,26 @@ const char* behindComma(const char* text, const char* end) {
     return text != end && !chars::is(chars::digit, *text) && *text != '-' ? skipSeparators(text, end) : text;
 }
 
+/// Numbers that are looked at singly before whole blocks are tried (again): most lists are short.
+constexpr int kSingleNumbers = 8;
+
+/// Adds numbers as far as blocks of them go. The position of the next number.
+const char* addBlocks(NumberRun& run, const char* text, const char* stop, const char* end) {
+    const NumberBlocks numbers = skipNumberBlocks(text, stop);
+    if (numbers.count == 0)
+        return text;
+    run.count += numbers.count;
+    run.numbersEnd = numbers.lastComma;
+    run.next = behindComma(numbers.lastComma + 1, end);
+    run.afterComma = true;
+    return run.next;
+}
+
 PartialRun scanUpTo(const char* stop, const char* text, const char* end, bool wordsCount) {
     NumberRun run{0, text, text, false};
-    while (text < stop) {
+    for (int single = 1; text < stop; ++single) {
+        if (single % kSingleNumbers == 0 && (text = addBlocks(run, text, stop, end)) >= stop)
+            break;
         const char* const after = numberEnd(text, end, wordsCount);
         const char* const next = after != end && *after == ',' ? after : skipBlanks(after, end);
         if (after == text || (next != end && *next == ':'))
