@@ -62,15 +62,30 @@ FbxProperty compoundOf(const FbxProperty& property) {
 PropertyData& editable(FbxProperty& property) { return property.GetFbxObject()->data().materialise(property.index()); }
 
 /// Whether the value is the row's default, to the bit.
-bool keepsDefault(const PropertyRow& row, const void* value, EFbxType type) {
-    const detail::PropertyValue unset = detail::defaultValue(row);
-    detail::PropertyValue set = unset;
+bool isDefault(const PropertyRow& row, const detail::PropertyValue& value) {
     const auto sameBits = [](double a, double b) {
         return std::bit_cast<std::uint64_t>(a) == std::bit_cast<std::uint64_t>(b);
     };
-    return detail::writePropertyValue(set, row.type->GetType(), value, type) && set.integer == unset.integer &&
-           std::equal(set.numbers.begin(), set.numbers.end(), unset.numbers.begin(), sameBits) &&
-           set.text == unset.text;
+    return value.integer == static_cast<std::int64_t>(row.numbers[0]) &&
+           std::equal(value.numbers.begin(), value.numbers.end(), row.numbers.begin(), sameBits) &&
+           value.text == row.text;
+}
+
+/// Writes a property of the class that is not stored. A value that is the default need not be.
+bool writeUnstored(detail::ObjectData& object, int index, const void* value, EFbxType type) {
+    const PropertyRow& row = object.info->rows[static_cast<std::size_t>(index)];
+    const EFbxType kept = row.type->GetType();
+    detail::PropertyValue set = detail::defaultValue(row);
+    if (!detail::isWritable(kept, type) || !detail::writePropertyValue(set, kept, value, type))
+        return false;
+    if (!isDefault(row, set))
+        object.materialise(index).value = std::move(set);
+    return true;
+}
+
+bool writeStored(PropertyData& property, const void* value, EFbxType type) {
+    const EFbxType kept = property.type.GetType();
+    return detail::isWritable(kept, type) && detail::writePropertyValue(property.value, kept, value, type);
 }
 
 /// The first property from the index on that belongs to the compound, or to none when that is invalid.
@@ -161,12 +176,9 @@ void FbxProperty::readValue(void* pValue, EFbxType pType) const {
 bool FbxProperty::writeValue(const void* pValue, EFbxType pType) {
     if (!exists(*this))
         return false;
-    const EFbxType type = GetPropertyDataType().GetType();
-    if (!detail::isWritable(type, pType))
-        return false;
-    // The default of a property that is not stored need not be.
-    const bool isWritten = (!dataOf(*this) && keepsDefault(*rowOf(*this), pValue, pType)) ||
-                           detail::writePropertyValue(editable(*this).value, type, pValue, pType);
+    detail::ObjectData& object = mObject->data();
+    PropertyData* const stored = object.property(mIndex);
+    const bool isWritten = stored ? writeStored(*stored, pValue, pType) : writeUnstored(object, mIndex, pValue, pType);
     if (isWritten)
         ++mObject->GetFbxManager()->data().revision;
     return isWritten;

@@ -2,6 +2,7 @@
 // Copyright (c) Tarnell FBX contributors
 #pragma once
 
+#include <algorithm>
 #include <array>
 #include <atomic>
 #include <memory>
@@ -16,6 +17,7 @@
 #include "object/ConnectionList.h"
 #include "schema/NameIndex.h"
 #include "schema/PropertyRow.h"
+#include "schema/Schema.h"
 
 FBXSDK_NAMESPACE_BEGIN
 namespace detail {
@@ -185,6 +187,21 @@ void leaveScene(FbxObject& object);
 template <class T>
 FbxPropertyT<T> bindProperty(FbxObject& object, const NameKey& name) {
     return FbxPropertyT<T>(FbxProperty(&object, object.data().info->findRow(name)));
+}
+
+/// A name as an argument of a template.
+template <std::size_t size>
+struct NameLiteral {
+    consteval NameLiteral(const char (&name)[size]) { std::copy(name, name + size, text); }
+    char text[size];
+};
+
+/// The same for classes of which a file or the library makes many: the row is searched once. Classes below it must
+/// start with the same rows.
+template <class T, const auto& rows, NameLiteral name>
+FbxPropertyT<T> bindRow(FbxObject& object) {
+    static const int row = rowIndex(rows, name.text);
+    return FbxPropertyT<T>(FbxProperty(&object, row));
 }
 
 } // namespace detail

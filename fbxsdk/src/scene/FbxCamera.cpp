@@ -20,6 +20,11 @@ constexpr double kMillimetresPerInch = 25.4;
 constexpr double kNearestPlane = 0.001;
 constexpr double kFarthestPlane = 600000.0;
 
+template <class T, detail::NameLiteral name>
+FbxPropertyT<T> bind(FbxCamera& camera) {
+    return detail::bindRow<T, detail::kCameraRows, name>(camera);
+}
+
 /// Film backs, inches.
 constexpr struct {
     FbxCamera::EApertureFormat format;
@@ -47,39 +52,27 @@ double planeDistance(double distance) {
 } // namespace
 
 FbxCamera::FbxCamera(FbxManager& pManager, const detail::ClassInfo& pInfo)
-    : FbxNodeAttribute(pManager, pInfo), Position(detail::bindProperty<FbxDouble3>(*this, "Position")),
-      UpVector(detail::bindProperty<FbxDouble3>(*this, "UpVector")),
-      InterestPosition(detail::bindProperty<FbxDouble3>(*this, "InterestPosition")),
-      Roll(detail::bindProperty<FbxDouble>(*this, "Roll")),
-      OpticalCenterX(detail::bindProperty<FbxDouble>(*this, "OpticalCenterX")),
-      OpticalCenterY(detail::bindProperty<FbxDouble>(*this, "OpticalCenterY")),
-      BackgroundColor(detail::bindProperty<FbxDouble3>(*this, "BackgroundColor")),
-      AspectRatioMode(detail::bindProperty<EAspectRatioMode>(*this, "AspectRatioMode")),
-      AspectWidth(detail::bindProperty<FbxDouble>(*this, "AspectWidth")),
-      AspectHeight(detail::bindProperty<FbxDouble>(*this, "AspectHeight")),
-      PixelAspectRatio(detail::bindProperty<FbxDouble>(*this, "PixelAspectRatio")),
-      FilmOffsetX(detail::bindProperty<FbxDouble>(*this, "FilmOffsetX")),
-      FilmOffsetY(detail::bindProperty<FbxDouble>(*this, "FilmOffsetY")),
-      FilmWidth(detail::bindProperty<FbxDouble>(*this, "FilmWidth")),
-      FilmHeight(detail::bindProperty<FbxDouble>(*this, "FilmHeight")),
-      FilmAspectRatio(detail::bindProperty<FbxDouble>(*this, "FilmAspectRatio")),
-      FilmSqueezeRatio(detail::bindProperty<FbxDouble>(*this, "FilmSqueezeRatio")),
-      FilmFormat(detail::bindProperty<EApertureFormat>(*this, "FilmFormatIndex")),
-      ApertureMode(detail::bindProperty<EApertureMode>(*this, "ApertureMode")),
-      GateFit(detail::bindProperty<EGateFit>(*this, "GateFit")),
-      FieldOfView(detail::bindProperty<FbxDouble>(*this, "FieldOfView")),
-      FieldOfViewX(detail::bindProperty<FbxDouble>(*this, "FieldOfViewX")),
-      FieldOfViewY(detail::bindProperty<FbxDouble>(*this, "FieldOfViewY")),
-      FocalLength(detail::bindProperty<FbxDouble>(*this, "FocalLength")),
-      CameraFormat(detail::bindProperty<EFormat>(*this, "CameraFormat")),
-      NearPlane(detail::bindProperty<FbxDouble>(*this, "NearPlane")),
-      FarPlane(detail::bindProperty<FbxDouble>(*this, "FarPlane")),
-      BackPlaneDistance(detail::bindProperty<FbxDouble>(*this, "BackPlaneDistance")),
-      FrontPlaneDistance(detail::bindProperty<FbxDouble>(*this, "FrontPlaneDistance")),
-      ProjectionType(detail::bindProperty<EProjectionType>(*this, "CameraProjectionType")),
-      OrthoZoom(detail::bindProperty<FbxDouble>(*this, "OrthoZoom")),
-      FocusSource(detail::bindProperty<EFocusDistanceSource>(*this, "FocusSource")),
-      FocusDistance(detail::bindProperty<FbxDouble>(*this, "FocusDistance")) {}
+    : FbxNodeAttribute(pManager, pInfo), Position(bind<FbxDouble3, "Position">(*this)),
+      UpVector(bind<FbxDouble3, "UpVector">(*this)), InterestPosition(bind<FbxDouble3, "InterestPosition">(*this)),
+      Roll(bind<FbxDouble, "Roll">(*this)), OpticalCenterX(bind<FbxDouble, "OpticalCenterX">(*this)),
+      OpticalCenterY(bind<FbxDouble, "OpticalCenterY">(*this)),
+      BackgroundColor(bind<FbxDouble3, "BackgroundColor">(*this)),
+      AspectRatioMode(bind<EAspectRatioMode, "AspectRatioMode">(*this)),
+      AspectWidth(bind<FbxDouble, "AspectWidth">(*this)), AspectHeight(bind<FbxDouble, "AspectHeight">(*this)),
+      PixelAspectRatio(bind<FbxDouble, "PixelAspectRatio">(*this)), FilmOffsetX(bind<FbxDouble, "FilmOffsetX">(*this)),
+      FilmOffsetY(bind<FbxDouble, "FilmOffsetY">(*this)), FilmWidth(bind<FbxDouble, "FilmWidth">(*this)),
+      FilmHeight(bind<FbxDouble, "FilmHeight">(*this)), FilmAspectRatio(bind<FbxDouble, "FilmAspectRatio">(*this)),
+      FilmSqueezeRatio(bind<FbxDouble, "FilmSqueezeRatio">(*this)),
+      FilmFormat(bind<EApertureFormat, "FilmFormatIndex">(*this)),
+      ApertureMode(bind<EApertureMode, "ApertureMode">(*this)), GateFit(bind<EGateFit, "GateFit">(*this)),
+      FieldOfView(bind<FbxDouble, "FieldOfView">(*this)), FieldOfViewX(bind<FbxDouble, "FieldOfViewX">(*this)),
+      FieldOfViewY(bind<FbxDouble, "FieldOfViewY">(*this)), FocalLength(bind<FbxDouble, "FocalLength">(*this)),
+      CameraFormat(bind<EFormat, "CameraFormat">(*this)), NearPlane(bind<FbxDouble, "NearPlane">(*this)),
+      FarPlane(bind<FbxDouble, "FarPlane">(*this)), BackPlaneDistance(bind<FbxDouble, "BackPlaneDistance">(*this)),
+      FrontPlaneDistance(bind<FbxDouble, "FrontPlaneDistance">(*this)),
+      ProjectionType(bind<EProjectionType, "CameraProjectionType">(*this)),
+      OrthoZoom(bind<FbxDouble, "OrthoZoom">(*this)), FocusSource(bind<EFocusDistanceSource, "FocusSource">(*this)),
+      FocusDistance(bind<FbxDouble, "FocusDistance">(*this)) {}
 
 FbxCamera::~FbxCamera() = default;
 
