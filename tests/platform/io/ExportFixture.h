@@ -89,6 +89,24 @@ class EveryLayout : public ExportFixture, public testing::WithParamInterface<Lay
 protected:
     fbxsdk::FbxScene* writeAndRead() { return ExportFixture::writeAndRead(GetParam()); }
     std::string write() { return ExportFixture::write(GetParam()); }
+
+    static fbxsdk::FbxNode* childOf(fbxsdk::FbxScene* copy, int index = 0) {
+        return copy->GetRootNode()->GetChild(index);
+    }
+    /// The attribute of a node below the root. Having another one is a failure of the test.
+    template <class T>
+    static T* attributeOf(fbxsdk::FbxScene* copy, int index = 0) {
+        fbxsdk::FbxNode* node = childOf(copy, index);
+        T* attribute = node ? fbxsdk::FbxCast<T>(node->GetNodeAttribute()) : nullptr;
+        EXPECT_NE(attribute, nullptr);
+        return attribute;
+    }
 };
+
+inline void expectVector(const fbxsdk::FbxDouble3& actual, double x, double y, double z) {
+    EXPECT_EQ(actual[0], x);
+    EXPECT_EQ(actual[1], y);
+    EXPECT_EQ(actual[2], z);
+}
 
 } // namespace exporting

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// Meshes, layers, skins, blend shapes and other geometry in files of every version.
+// Meshes, layers, skins, blend shapes, caches and other geometry in files of every version.
 #include "geometry/GeometryWriting.h"
 
 #include <string>
@@ -15,6 +15,7 @@
 #include <fbxsdk/FbxAnimStack.h>
 #include <fbxsdk/FbxBlendShape.h>
 #include <fbxsdk/FbxBlendShapeChannel.h>
+#include <fbxsdk/FbxCache.h>
 #include <fbxsdk/FbxCluster.h>
 #include <fbxsdk/FbxLine.h>
 #include <fbxsdk/FbxNurbsCurve.h>
@@ -22,6 +23,7 @@
 #include <fbxsdk/FbxPatch.h>
 #include <fbxsdk/FbxSkeleton.h>
 #include <fbxsdk/FbxSkin.h>
+#include <fbxsdk/FbxVertexCacheDeformer.h>
 
 #include "ExportFixture.h"
 #include "platform/scene/Animate.h"
@@ -47,13 +49,6 @@ protected:
         }
         addNode(name, mesh);
         return mesh;
-    }
-    template <class T>
-    static T* attributeOf(FbxScene* copy, int index = 0) {
-        FbxNode* node = copy->GetRootNode()->GetChild(index);
-        T* attribute = node ? FbxCast<T>(node->GetNodeAttribute()) : nullptr;
-        EXPECT_NE(attribute, nullptr);
-        return attribute;
     }
 };
 
@@ -558,6 +553,33 @@ TEST_P(GeometryWriting, KeepsLines) {
     EXPECT_EQ(back->GetPointIndexAt(3), 2);
     EXPECT_EQ(back->GetEndPointCount(), 2);
     EXPECT_EQ(back->GetEndPointAt(0), 1);
+}
+
+TEST_P(GeometryWriting, KeepsACacheOnItsDeformer) {
+    FbxMesh* mesh = make<FbxMesh>("mesh");
+    addNode("node", mesh);
+    FbxVertexCacheDeformer* deformer = make<FbxVertexCacheDeformer>("deformer");
+    deformer->Channel.Set("points");
+    deformer->Active.Set(false);
+    FbxCache* cache = make<FbxCache>("cache");
+    cache->SetCacheFileFormat(FbxCache::eMayaCache);
+    cache->SetCacheFileName("fpc\\points.xml", "/absolute/fpc/points.xml");
+    deformer->SetCache(cache);
+    mesh->AddDeformer(deformer);
+
+    FbxMesh* back = attributeOf<FbxMesh>(writeAndRead());
+
+    ASSERT_NE(back, nullptr);
+    auto* backDeformer = FbxCast<FbxVertexCacheDeformer>(back->GetDeformer(0));
+    ASSERT_NE(backDeformer, nullptr);
+    EXPECT_STREQ(backDeformer->Channel.Get().Buffer(), "points");
+    EXPECT_FALSE(backDeformer->Active.Get());
+    ASSERT_NE(backDeformer->GetCache(), nullptr);
+    EXPECT_EQ(backDeformer->GetCache()->GetCacheFileFormat(), FbxCache::eMayaCache);
+    FbxString relative, absolute;
+    backDeformer->GetCache()->GetCacheFileName(relative, absolute);
+    EXPECT_STREQ(relative.Buffer(), "fpc\\points.xml");
+    EXPECT_STREQ(absolute.Buffer(), "/absolute/fpc/points.xml");
 }
 
 } // namespace

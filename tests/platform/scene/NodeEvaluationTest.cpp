@@ -420,6 +420,14 @@ TEST_F(NodeEvaluationTest, GivesTheSameInAnyOrderOfTimesAndNodes) {
     }
 }
 
+/// An order, a rotation before it and a pivot.
+void setRandomRotation(FbxNode& node, SeededRandom& random) {
+    node.SetRotationActive(true);
+    node.SetRotationOrder(kSet, kOrders[random.whole(6)].order);
+    node.SetPreRotation(kSet, random.vector(-90, 90));
+    node.SetRotationPivot(kSet, random.vector(-5, 5));
+}
+
 TEST_F(NodeEvaluationTest, GivesTheSameBitsForManyTimesTogether) {
     FbxAnimLayer* base = addStack(*scene);
     FbxAnimLayer* additive = addLayer(*base->GetScene()->GetCurrentAnimationStack());
@@ -430,12 +438,8 @@ TEST_F(NodeEvaluationTest, GivesTheSameBitsForManyTimesTogether) {
         node->LclTranslation.Set(random.triple(-10, 10));
         node->LclScaling.Set(random.triple(0.5, 2));
         node->SetTransformationInheritType(static_cast<FbxTransform::EInheritType>(random.whole(3)));
-        if (random.chance(2)) {
-            node->SetRotationActive(true);
-            node->SetRotationOrder(kSet, kOrders[random.whole(6)].order);
-            node->SetPreRotation(kSet, random.vector(-90, 90));
-            node->SetRotationPivot(kSet, random.vector(-5, 5));
-        }
+        if (random.chance(2))
+            setRandomRotation(*node, random);
         if (!random.chance(3)) {
             for (FbxAnimLayer* layer : {base, additive}) {
                 keys(node->LclRotation, layer, "Y", {{0, random.real(-90, 90)}, {3, random.real(-90, 90)}});
@@ -489,10 +493,7 @@ std::vector<FbxNode*> translatedTree(FbxScene& scene, bool isTwin) {
         node->LclScaling.Set(FbxDouble3(1.0, random.chance(9) ? 0.0 : scale, random.chance(9) ? 1e200 : 1.0));
         node->SetTransformationInheritType(static_cast<FbxTransform::EInheritType>(random.whole(3)));
         if (random.chance(2)) {
-            node->SetRotationActive(true);
-            node->SetRotationOrder(kSet, kOrders[random.whole(6)].order);
-            node->SetPreRotation(kSet, random.vector(-90, 90));
-            node->SetRotationPivot(kSet, random.vector(-5, 5));
+            setRandomRotation(*node, random);
             node->SetScalingOffset(kSet, random.vector(-5, 5));
         }
         if (random.chance(3))
