@@ -20,7 +20,7 @@ namespace detail {
 
 namespace {
 
-constexpr int kBlock = 64;
+constexpr int kBlockSize = 64;
 
 /// Bit i is set where byte i is of that kind.
 struct Kinds {
@@ -41,7 +41,7 @@ __m128i equal(__m128i bytes, char c) { return _mm_cmpeq_epi8(bytes, _mm_set1_epi
 
 std::uint64_t blanksOf(const char* block) {
     std::uint64_t blanks = 0;
-    for (int part = 0; part < kBlock / 16; ++part) {
+    for (int part = 0; part < kBlockSize / 16; ++part) {
         const __m128i bytes = partOf(block, part);
         blanks |= bitsOf(_mm_or_si128(_mm_or_si128(equal(bytes, ' '), equal(bytes, '\t')),
                                       _mm_or_si128(equal(bytes, '\r'), equal(bytes, '\n'))),
@@ -52,7 +52,7 @@ std::uint64_t blanksOf(const char* block) {
 
 Kinds kindsOf(const char* block) {
     Kinds kinds;
-    for (int part = 0; part < kBlock / 16; ++part) {
+    for (int part = 0; part < kBlockSize / 16; ++part) {
         const __m128i bytes = partOf(block, part);
         const __m128i value = _mm_sub_epi8(bytes, _mm_set1_epi8('0'));
         kinds.digit |= bitsOf(_mm_cmpeq_epi8(_mm_min_epu8(value, _mm_set1_epi8(9)), value), part);
@@ -81,7 +81,7 @@ std::uint64_t nextMarks(std::uint64_t of, std::uint64_t marks, std::uint64_t& op
     const std::uint64_t behind = shifted(of, open);
     const std::uint64_t sum = behind + ~marks;
     const bool overflows = sum < behind;
-    open = overflows ? 1 : of >> (kBlock - 1);
+    open = overflows ? 1 : of >> (kBlockSize - 1);
     return sum & marks;
 }
 
@@ -94,9 +94,9 @@ std::uint64_t misplaced(const Kinds& kinds, Before& before) {
     const std::uint64_t afterExponent = shifted(kinds.exponent, before.exponent);
     const std::uint64_t afterPointMark = nextMarks(kinds.point, marks, before.pastPoint);
     const std::uint64_t afterExponentMark = nextMarks(kinds.exponent, marks, before.pastExponent);
-    before.digit = kinds.digit >> (kBlock - 1);
-    before.gap = gap >> (kBlock - 1);
-    before.exponent = kinds.exponent >> (kBlock - 1);
+    before.digit = kinds.digit >> (kBlockSize - 1);
+    before.gap = gap >> (kBlockSize - 1);
+    before.exponent = kinds.exponent >> (kBlockSize - 1);
     return kinds.other() | (marks & ~afterDigit) | (kinds.sign & ~(afterGap | afterExponent)) |
            (kinds.blank & ~afterGap) | (afterPointMark & kinds.point) |
            (afterExponentMark & (kinds.point | kinds.exponent));
@@ -108,13 +108,13 @@ NumberBlocks skipNumberBlocks(const char* text, const char* stop) {
     NumberBlocks numbers;
     Before before;
     std::uint64_t wrong = 0;
-    for (; wrong == 0 && stop - text >= kBlock; text += kBlock) {
+    for (; wrong == 0 && stop - text >= kBlockSize; text += kBlockSize) {
         const Kinds kinds = kindsOf(text);
         wrong = misplaced(kinds, before);
         const std::uint64_t commas = kinds.comma & (wrong == 0 ? ~std::uint64_t{0} : (wrong & (0 - wrong)) - 1);
         if (commas != 0) {
             numbers.count += static_cast<std::uint64_t>(std::popcount(commas));
-            numbers.lastComma = text + (kBlock - 1 - std::countl_zero(commas));
+            numbers.lastComma = text + (kBlockSize - 1 - std::countl_zero(commas));
         }
     }
     return numbers;
