@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 // Copyright (c) Tarnell FBX contributors
 //
-// The interface to the compression library.
+// The interface to the compression libraries.
 #pragma once
 
 #include <array>

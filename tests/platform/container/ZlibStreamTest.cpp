@@ -4,6 +4,7 @@
 // Streams in and out. Recent short ones are cached, which must not be observable.
 #include "container/ZlibStream.h"
 
+#include <random>
 #include <string>
 #include <vector>
 
@@ -69,6 +70,34 @@ TEST(ZlibStream, InflatesLongStreams) {
     const std::string content = contentOf(1, 1'000'000), stream = streamOf(content);
     EXPECT_EQ(inflated(stream, content.size()), content);
     EXPECT_EQ(inflated(stream, content.size()), content);
+}
+
+TEST(ZlibStream, HasTheBytesOfContentsOfAnySize) {
+    std::mt19937 random(11);
+    Deflater deflater; // one for all: a stream begins where another one was given up
+    for (std::size_t size = 1; size < 300'000; size += 1 + size / 9) {
+        for (const unsigned kinds : {1U, 4U, 256U}) {
+            std::string content(size, '\0');
+            for (char& c : content)
+                c = static_cast<char>(random() % kinds);
+            const auto stream = deflater.deflated(content);
+            ASSERT_LT(stream.size(), content.size());
+            if (kinds == 256)
+                EXPECT_TRUE(stream.empty()) << size << ": noise does not become smaller";
+            else if (size > 100)
+                EXPECT_EQ(inflated({stream.begin(), stream.end()}, size), content) << size << ' ' << kinds;
+        }
+    }
+}
+
+TEST(ZlibStream, IsTheSameWhateverWasDeflatedBefore) {
+    const std::string content = contentOf(3, 400'000);
+    Deflater deflater;
+    for (int i = 0; i < 3; ++i) {
+        const auto stream = deflater.deflated(content);
+        EXPECT_TRUE(std::string(stream.begin(), stream.end()) == streamOf(content)) << i;
+        static_cast<void>(deflater.deflated(contentOf(i, 5000)));
+    }
 }
 
 } // namespace
