@@ -17,9 +17,16 @@ const DocumentProperty* DocumentObject::property(std::string_view propertyName) 
 }
 
 const DocumentObject* Document::find(std::int64_t objectId) const {
-    const auto found = std::lower_bound(idIndex.begin(), idIndex.end(), objectId,
-                                        [](const auto& entry, std::int64_t wanted) { return entry.first < wanted; });
-    return found != idIndex.end() && found->first == objectId ? &objects[found->second] : nullptr;
+    if (idIndex.empty())
+        return nullptr;
+    // Ids are like random numbers: a search with branches takes the wrong one at half of its steps.
+    const auto* entry = idIndex.data();
+    for (std::size_t count = idIndex.size(); count > 1;) {
+        const std::size_t half = count / 2;
+        entry += half * std::size_t{entry[half - 1].first < objectId};
+        count -= half;
+    }
+    return entry->first == objectId ? &objects[entry->second] : nullptr;
 }
 
 std::span<const Value> Document::keep(std::initializer_list<Value> values) {
