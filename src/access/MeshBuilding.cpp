@@ -3,14 +3,20 @@
 //
 #include "MeshBuilding.h"
 
+#include "model/MeshArrays.h"
+
 #include <algorithm>
+#include <cstddef>
 #include <cstdint>
 #include <limits>
+#include <numeric>
 
 namespace Tarnell::Fbx {
 
 namespace {
 
+using detail::MeshArrays;
+using detail::SharedArray;
 using Element = fbxsdk::FbxLayerElement;
 
 /// How many polygon vertices the polygons may claim beyond the existing ones. Each becomes a corner at point 0; the
@@ -19,26 +25,40 @@ constexpr std::int64_t kMostMissingCorners = 65536;
 
 double widen(float value) { return static_cast<double>(value); }
 
-fbxsdk::FbxVector4 point(float x, float y, float z) { return {widen(x), widen(y), widen(z), 1.0}; }
+fbxsdk::FbxVector4 point(const MeshArrays::Vector& vector) {
+    return {widen(vector.x), widen(vector.y), widen(vector.z), 1.0};
+}
+
+fbxsdk::FbxVector2 textureCoordinate(const MeshArrays::TextureCoordinate& uv) { return {widen(uv.u), widen(uv.v)}; }
+
+fbxsdk::FbxColor colour(const MeshArrays::Colour& value) {
+    return {widen(value.red), widen(value.green), widen(value.blue), widen(value.alpha)};
+}
+
+/// Converts elements from the first one on; those that the mesh lacks are zero.
+template <class Item, class Source, class Convert>
+void convertAll(const SharedArray<Source>& elements, Item* items, int count, Convert convert) {
+    const auto wanted = static_cast<std::size_t>(count);
+    const std::size_t stored = std::min(elements.storedCount(), wanted);
+    std::transform(elements.stored(), elements.stored() + stored, items, convert);
+    const std::size_t present = std::min(elements.size(), wanted);
+    if (stored < present)
+        std::fill(items + stored, items + present, convert(*elements.filler()));
+    std::fill(items + present, items + wanted, convert(Source{}));
+}
 
 /// The first set.
 void setPoints(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
     const int count = mesh.getNumberOfControlPoints();
     target.InitControlPoints(count);
-    fbxsdk::FbxVector4* points = target.GetControlPoints();
-    for (int i = 0; i < count; ++i) {
-        float x = 0.0f, y = 0.0f, z = 0.0f;
-        mesh.getControlPoint(i, x, y, z);
-        points[i] = point(x, y, z);
-    }
+    convertAll(MeshArrays::controlPointsOf(mesh), target.GetControlPoints(), count, point);
 }
 
-template <class Array, class ValueAt>
-void fillArray(Array& array, int count, ValueAt valueAt) {
+template <class Array, class Fill>
+void fillArray(Array& array, int count, Fill fill) {
     array.SetCount(count);
     auto* items = array.GetLocked();
-    for (int i = 0; i < count; ++i)
-        items[i] = valueAt(i);
+    fill(items);
     array.Release(&items);
 }
 
@@ -46,57 +66,48 @@ void setNormals(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer
     auto* normals = fbxsdk::FbxLayerElementNormal::Create(&target, "");
     normals->SetMappingMode(Element::eByPolygonVertex);
     normals->SetReferenceMode(Element::eDirect);
-    fillArray(normals->GetDirectArray(), mesh.getNumberOfPolygonVertices(), [&mesh](int i) {
-        float x = 0.0f, y = 0.0f, z = 0.0f;
-        mesh.getNormal(i, x, y, z);
-        return point(x, y, z);
-    });
+    const int count = mesh.getNumberOfPolygonVertices();
+    fillArray(normals->GetDirectArray(), count,
+              [&](fbxsdk::FbxVector4* items) { convertAll(MeshArrays::normalsOf(mesh), items, count, point); });
     layer.SetNormals(normals);
 }
 
 /// One value per polygon vertex, and consecutive indices.
-template <class MappedElement, class ValueAt>
-void fillIndexed(MappedElement& element, int count, ValueAt valueAt) {
+template <class MappedElement, class Values, class Convert>
+void fillIndexed(MappedElement& element, const Values& values, int count, Convert convert) {
     element.SetMappingMode(Element::eByPolygonVertex);
     element.SetReferenceMode(Element::eIndexToDirect);
-    fillArray(element.GetDirectArray(), count, valueAt);
-    fillArray(element.GetIndexArray(), count, [](int i) { return i; });
+    fillArray(
+        element.GetDirectArray(), count, [&](auto* items) { convertAll(values, items, count, convert); });
+    fillArray(element.GetIndexArray(), count, [count](int* items) { std::iota(items, items + count, 0); });
 }
 
 void setUVs(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer& layer) {
     auto* uvs = fbxsdk::FbxLayerElementUV::Create(&target, "map1");
-    fillIndexed(*uvs, mesh.getNumberOfPolygonVertices(), [&mesh](int i) {
-        float u = 0.0f, v = 0.0f;
-        mesh.getUV(i, u, v);
-        return fbxsdk::FbxVector2(widen(u), widen(v));
-    });
+    fillIndexed(*uvs, MeshArrays::uvsOf(mesh), mesh.getNumberOfPolygonVertices(), textureCoordinate);
     layer.SetUVs(uvs, Element::eTextureDiffuse);
 }
 
 void setColours(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target, fbxsdk::FbxLayer& layer) {
     auto* colours = fbxsdk::FbxLayerElementVertexColor::Create(&target, "");
-    fillIndexed(*colours, mesh.getNumberOfPolygonVertices(), [&mesh](int i) {
-        float red = 0.0f, green = 0.0f, blue = 0.0f, alpha = 0.0f;
-        mesh.getColour(i, red, green, blue, alpha);
-        return fbxsdk::FbxColor(widen(red), widen(green), widen(blue), widen(alpha));
-    });
+    fillIndexed(*colours, MeshArrays::coloursOf(mesh), mesh.getNumberOfPolygonVertices(), colour);
     layer.SetVertexColors(colours);
 }
 
-/// Polygons without corners are omitted; the next one continues at their position.
+/// Polygons without corners are omitted; the next one continues at their position. Missing corners are at point 0.
 void addPolygons(const TnFbxMesh& mesh, fbxsdk::FbxMesh& target) {
-    target.ReservePolygonCount(mesh.getNumberOfPolygons());
-    target.ReservePolygonVertexCount(mesh.getNumberOfPolygonVertices());
-    int polygonVertex = 0;
-    for (int polygon = 0; polygon < mesh.getNumberOfPolygons(); ++polygon) {
-        const int size = mesh.getPolygonVertexSize(polygon);
+    const SharedArray<int>& sizes = MeshArrays::polygonVertexSizesOf(mesh);
+    const SharedArray<int>& points = MeshArrays::pointIndicesOf(mesh);
+    target.ReservePolygonCount(static_cast<int>(sizes.size()));
+    target.ReservePolygonVertexCount(static_cast<int>(points.size()));
+    std::size_t polygonVertex = 0;
+    for (std::size_t polygon = 0; polygon < sizes.size(); ++polygon) {
+        const int size = sizes[polygon];
         if (size <= 0)
             continue;
         target.BeginPolygon(/*pMaterial*/ -1, /*pTexture*/ -1, /*pGroup*/ -1, /*pLegacy*/ true);
-        for (int corner = 0; corner < size; ++corner) {
-            target.AddPolygon(mesh.getPointIndex(polygonVertex), /*pTextureUVIndex*/ -1);
-            ++polygonVertex;
-        }
+        for (int corner = 0; corner < size; ++corner, ++polygonVertex)
+            target.AddPolygon(polygonVertex < points.size() ? points[polygonVertex] : 0, /*pTextureUVIndex*/ -1);
         target.EndPolygon();
     }
 }

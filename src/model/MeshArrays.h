@@ -19,6 +19,7 @@ class MeshArrays {
 public:
     using Vector = TnFbxMesh::Vector;
     using TextureCoordinate = TnFbxMesh::TextureCoordinate;
+    using Colour = TnFbxMesh::Colour;
 
     explicit MeshArrays(TnFbxMesh& mesh) : mMesh(mesh) {}
     MeshArrays(const MeshArrays&) = delete;
@@ -36,6 +37,16 @@ public:
     /// Which arrays a mesh has, and which flags: equal for meshes that share all of them, as long as these exist.
     using Identity = std::array<const void*, 9>;
     static Identity identityOf(const TnFbxMesh& mesh);
+
+    // For reading a mesh array by array.
+    static const SharedArray<int>& polygonVertexSizesOf(const TnFbxMesh& mesh) {
+        return mesh.mGeometry.polygonVertexSizes;
+    }
+    static const SharedArray<int>& pointIndicesOf(const TnFbxMesh& mesh) { return mesh.mGeometry.pointIndices; }
+    static const SharedArray<Vector>& controlPointsOf(const TnFbxMesh& mesh) { return mesh.mGeometry.controlPoints; }
+    static const SharedArray<Vector>& normalsOf(const TnFbxMesh& mesh) { return mesh.mGeometry.normals; }
+    static const SharedArray<TextureCoordinate>& uvsOf(const TnFbxMesh& mesh) { return mesh.mGeometry.uvs; }
+    static const SharedArray<Colour>& coloursOf(const TnFbxMesh& mesh) { return mesh.mGeometry.colours; }
 
     /// To be called first; the mesh is initialised. False when a number is below 1; the mesh is empty then and no array
     /// may be requested.
@@ -65,7 +76,7 @@ public:
     void addUVs(const TextureCoordinate* uvs, std::size_t count) { append(mMesh.mGeometry.uvs.own(), uvs, count); }
 
     /// All of them, of which those that are not set have the default.
-    TnFbxMesh::Colour* colours();
+    Colour* colours();
 
     const int* addedPolygonVertexSizes() const { return mMesh.mGeometry.polygonVertexSizes.stored(); }
     const int* addedPointIndices() const { return mMesh.mGeometry.pointIndices.stored(); }

@@ -134,6 +134,12 @@ protected:
     void resizeItems(int pCount, std::size_t pItemSize);
     /// Moves the items from the index on up by one, and returns the index.
     void* openSlot(int pIndex, std::size_t pItemSize);
+    /// Appends an item.
+    void* addSlot(std::size_t pItemSize) {
+        if (mCount == mCapacity)
+            return openSlot(mCount, pItemSize);
+        return static_cast<std::byte*>(mItems) + static_cast<std::size_t>(mCount++) * pItemSize;
+    }
     void closeSlots(int pIndex, int pCount, std::size_t pItemSize);
 
 private:
@@ -191,7 +197,7 @@ public:
     void add(const T& pItem) {
         const T item = pItem;
         ensureInMemory();
-        *static_cast<T*>(openSlot(count(), kItemBytes)) = item;
+        *static_cast<T*>(addSlot(kItemBytes)) = item;
     }
     void insert(int pIndex, const T& pItem) {
         const T item = pItem;
