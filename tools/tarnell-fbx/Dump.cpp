@@ -3,13 +3,16 @@
 //
 // tarnell-fbx dump: the library's value objects as JSON.
 #include <algorithm>
+#include <bit>
 #include <cmath>
+#include <cstdint>
 #include <functional>
 #include <iostream>
 #include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <tuple>
 #include <type_traits>
 #include <utility>
 #include <vector>
@@ -53,21 +56,20 @@ public:
     }
 
     void transform(TnFbxTransform& object) {
-        static const auto kKeys = keysOf<TnFbxTransform::EFbxTransformChannelType>(
-            [](auto channel) { return TnFbxTransform::getTransformChannelName(channel); });
-        mJson.key("name");
+        static const JsonKey kName("name");
+        mJson.key(kName);
         mJson.text(object.getName());
         enumerator("rotationOrder", {"XYZ", "XZY", "YXZ", "YZX", "ZXY", "ZYX"}, object.getTransformRotationOrder());
-        print<TnFbxTransform::EFbxTransformChannelType>("transform", kKeys, [&](auto channel) -> const TnFbxChannel& {
-            return *object.getTransformChannel(channel);
-        });
+        print<TnFbxTransform::EFbxTransformChannelType>(
+            "transform", TnFbxTransform::getTransformChannelName,
+            [&](auto channel) -> const TnFbxChannel& { return *object.getTransformChannel(channel); });
     }
 
     /// All channels of a class with named channels of its own.
     template <class Object, class Channel, class Find>
     void channels(const Find& find) {
-        static const auto kKeys = keysOf<Channel>([](auto channel) { return Object::getChannelName(channel); });
-        print<Channel>("channels", kKeys, find);
+        print<Channel>(
+            "channels", [](auto channel) { return Object::getChannelName(channel); }, find);
     }
 
     void details(TnFbxCamera& camera) {
@@ -113,24 +115,73 @@ public:
     }
 
 private:
-    /// The keys of all channels of a class.
-    template <class Channel, class NameOf>
-    static std::vector<JsonKey> keysOf(const NameOf& nameOf) {
-        std::vector<JsonKey> keys;
-        while (const char* name = nameOf(static_cast<Channel>(keys.size())))
-            keys.emplace_back(name);
-        return keys;
-    }
+    /// All that determines the text of a channel whose value never changes.
+    struct Constant {
+        bool animated = false;
+        std::uint32_t value = 0, sample = 0, rate = 0; // as bits: 0 and −0 are not the same text
+        int start = 0, end = 0;
 
-    template <class Channel, class Find>
-    void print(const char* key, const std::vector<JsonKey>& keys, const Find& find) {
+        bool operator==(const Constant&) const = default;
+    };
+
+    /// A channel of a class, and what it was in the last object if that was constant. Most channels of most objects are
+    /// those of the object before, and their text is copied.
+    struct Member {
+        JsonKey key;
+        std::optional<Constant> last{};
+        std::string text{}; ///< with the key
+    };
+    /// Those of the class with that type of channels.
+    template <class Channel>
+    struct Members {
+        std::vector<Member> all;
+    };
+
+    template <class Channel, class NameOf, class Find>
+    void print(const char* key, const NameOf& nameOf, const Find& find) {
+        std::vector<Member>& members = std::get<Members<Channel>>(mMembers).all;
+        while (const char* name = nameOf(static_cast<Channel>(members.size())))
+            members.push_back({JsonKey(name)});
         mJson.key(key);
         mJson.beginObject();
-        for (std::size_t i = 0; i < keys.size(); ++i) {
-            mJson.key(keys[i]);
-            print(find(static_cast<Channel>(i)));
-        }
+        for (std::size_t i = 0; i < members.size(); ++i)
+            print(members[i], find(static_cast<Channel>(i)));
         mJson.endObject();
+    }
+
+    void print(Member& member, const TnFbxChannel& channel) {
+        const std::optional<Constant> constant = constantOf(channel);
+        if (constant && constant == member.last) {
+            mJson.repeat(member.text);
+            return;
+        }
+        const JsonWriter::Place place = mJson.place();
+        mJson.key(member.key);
+        print(channel);
+        member.text = constant ? mJson.since(place) : std::string_view();
+        member.last = member.text.empty() ? std::nullopt : constant;
+    }
+
+    static std::optional<Constant> constantOf(const TnFbxChannel& channel) {
+        Constant constant;
+        constant.value = std::bit_cast<std::uint32_t>(channel.getValue());
+        if (!channel.getAnimated())
+            return constant;
+        const TnFbxTime time = channel.getTime();
+        constant.start = time.getStartFrame();
+        constant.end = time.getEndFrame();
+        if (!channel.isConstant() || !areExact(constant.start, constant.end))
+            return std::nullopt;
+        constant.animated = true;
+        constant.rate = std::bit_cast<std::uint32_t>(time.getFrameRate());
+        constant.sample = std::bit_cast<std::uint32_t>(channel.getAnimatedValue(static_cast<float>(constant.start)));
+        return constant;
+    }
+
+    /// Beyond, a frame as a float can be another one.
+    static bool areExact(long long first, long long last) {
+        constexpr long long kMostExact = 1 << 24;
+        return first >= -kMostExact && last <= kMostExact;
     }
 
     /// Markers give no access to their channels.
@@ -200,8 +251,7 @@ private:
     }
 
     void samples(const TnFbxChannel& channel, long long first, long long last) {
-        constexpr long long kMostExact = 1 << 24; // beyond, a float frame can be another one
-        if (channel.isConstant() && first >= -kMostExact && last <= kMostExact) {
+        if (channel.isConstant() && areExact(first, last)) {
             mJson.reals(channel.getAnimatedValue(static_cast<float>(first)),
                         static_cast<std::size_t>(last - first + 1));
             return;
@@ -240,6 +290,9 @@ private:
     bool mSamples;
     std::optional<JsonKey> mSamplesKey;
     TnFbxTime mSamplesTime; ///< of the key
+    std::tuple<Members<TnFbxTransform::EFbxTransformChannelType>, Members<TnFbxCamera::EFbxCameraChannelType>,
+               Members<TnFbxLight::EFbxLightChannelType>, Members<TnFbxMarker::EFbxMarkerChannelType>>
+        mMembers;
 };
 
 /// One file, loaded once, and all queries to it.

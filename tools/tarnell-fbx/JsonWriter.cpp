@@ -113,6 +113,7 @@ void JsonWriter::indent() {
 void JsonWriter::flush() {
     mOut.write(mBlock.get(), static_cast<std::streamsize>(mUsed));
     mUsed = 0;
+    ++mFlushes;
 }
 
 } // namespace tool

@@ -77,6 +77,22 @@ public:
     /// The same value that many times, as elements of an array.
     void reals(float value, std::size_t count);
 
+    /// Where something begins that may be repeated.
+    struct Place {
+        std::size_t flushes, used;
+    };
+    [[nodiscard]] Place place() const { return {mFlushes, mUsed}; }
+    /// What was written from a place on; nothing when part of it has reached the stream. Valid until the next call.
+    [[nodiscard]] std::string_view since(const Place& place) const {
+        return place.flushes == mFlushes ? std::string_view(mBlock.get() + place.used, mUsed - place.used)
+                                         : std::string_view();
+    }
+    /// Repeats a member where a whole object of the same kind has it too: behind as many others, at the same depth.
+    void repeat(std::string_view member) {
+        put(member);
+        mIsFirst = false;
+    }
+
     // A key and its value.
     void text(std::string_view name, std::string_view value) { key(name), text(value); }
     void integer(std::string_view name, long long value) { key(name), integer(value); }
@@ -150,6 +166,7 @@ private:
     std::ostream& mOut;
     std::unique_ptr<char[]> mBlock{new char[kBlockSize]}; ///< whose first characters are not in the stream yet
     std::size_t mUsed = 0;
+    std::size_t mFlushes = 0; ///< how often the block was emptied
     bool mPretty;
     bool mAfterKey = false;
     bool mIsFirst = true; ///< whether the next value is the first one of its object or array
