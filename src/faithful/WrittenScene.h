@@ -16,6 +16,7 @@
 #include <memory>
 #include <set>
 #include <string>
+#include <unordered_set>
 
 namespace Tarnell::Fbx::faithful {
 
@@ -64,7 +65,8 @@ private:
     std::unique_ptr<KeyWriter> mKeys;
     double mRate = 24.0;
     detail::ObjectWarnings mWarnings;
-    std::set<std::string> mNodeNames, mCacheNames;
+    std::unordered_set<std::string> mNodeNames;
+    std::set<std::string> mCacheNames;
     std::map<detail::MeshArrays::Identity, fbxsdk::FbxMesh*> mMeshes;
     std::map<std::string, int> mNextNumbers; // of caches, by the name of their mesh
 };

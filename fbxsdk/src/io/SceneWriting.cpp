@@ -7,7 +7,6 @@
 #include <algorithm>
 #include <array>
 #include <memory>
-#include <unordered_map>
 #include <unordered_set>
 
 #include <fbxsdk/FbxAnimCurve.h>
@@ -42,6 +41,29 @@ std::size_t rankOf(std::string_view record) {
 struct ChosenObject {
     FbxObject* object;
     const SchemaClass* schema;
+    std::size_t rank; ///< of its kind
+};
+
+/// The ids in the file, by the place of objects in the manager's list, which stays while a scene is written.
+class FileIds {
+public:
+    FileIds(const std::vector<ChosenObject>& objects, std::int64_t first) {
+        for (const ChosenObject& chosen : objects) {
+            const std::size_t slot = chosen.object->data().managerSlot;
+            if (slot >= mIds.size())
+                mIds.resize(std::max(slot + 1, 2 * mIds.size()));
+            mIds[slot] = first++;
+        }
+    }
+
+    /// 0 for objects that are not in the file.
+    [[nodiscard]] std::int64_t of(const FbxObject& object) const {
+        const std::size_t slot = object.data().managerSlot;
+        return slot < mIds.size() ? mIds[slot] : 0;
+    }
+
+private:
+    std::vector<std::int64_t> mIds;
 };
 
 /// The scene's objects that a file holds.
@@ -59,11 +81,10 @@ public:
             if (source->property >= 0 || !isWritten(object))
                 continue;
             if (const SchemaClass* schema = findSchema(object.GetClassId()))
-                chosen.push_back({&object, schema});
+                chosen.push_back({&object, schema, rankOf(schema->record)});
         }
-        std::stable_sort(chosen.begin(), chosen.end(), [](const ChosenObject& a, const ChosenObject& b) {
-            return rankOf(a.schema->record) < rankOf(b.schema->record);
-        });
+        std::stable_sort(chosen.begin(), chosen.end(),
+                         [](const ChosenObject& a, const ChosenObject& b) { return a.rank < b.rank; });
         return chosen;
     }
 
@@ -97,15 +118,15 @@ private:
 /// order among the sources of one object does.
 class ConnectionWriter {
 public:
-    ConnectionWriter(FbxScene& scene, const std::unordered_map<const FbxObject*, std::int64_t>& ids,
-                     std::vector<DocumentConnection>& connections, CommonTexts& texts)
+    ConnectionWriter(FbxScene& scene, const FileIds& ids, std::vector<DocumentConnection>& connections,
+                     CommonTexts& texts)
         : mScene(scene), mIds(ids), mConnections(connections), mTexts(texts) {}
 
     void write(const std::vector<ChosenObject>& objects) {
         const FbxNode& root = *mScene.GetRootNode();
         for (const ConnectionPoint* source : root.data().plug.sources)
             if (source->property < 0 && source->object->Is<FbxNode>())
-                add(kHierarchy, idOf(*source->object), 0);
+                add(kHierarchy, mIds.of(*source->object), 0);
         for (const ChosenObject& chosen : objects)
             writeSources(*chosen.object);
         for (const std::vector<DocumentConnection>& connections : mRanked)
@@ -115,12 +136,6 @@ public:
 private:
     enum Rank { kHierarchy, kLayers, kLayerMembers, kOthers, kCurves, kRanks };
 
-    /// 0 for objects that are not in the file.
-    [[nodiscard]] std::int64_t idOf(const FbxObject& object) const {
-        const auto found = mIds.find(&object);
-        return found == mIds.end() ? 0 : found->second;
-    }
-
     void add(Rank rank, std::int64_t source, std::int64_t destination, std::string_view sourceProperty = {},
              std::string_view destinationProperty = {}) {
         if (source != 0)
@@ -128,13 +143,13 @@ private:
     }
 
     void writeSources(const FbxObject& destination) {
-        const std::int64_t id = idOf(destination);
+        const std::int64_t id = mIds.of(destination);
         for (const ConnectionPoint* source : destination.data().plug.sources)
             if (!source->object->Is<FbxAnimCurve>() || !destination.Is<FbxAnimCurveNode>())
-                add(rankOf(*source->object, destination), idOf(*source->object), id, nameOf(*source));
+                add(rankOf(*source->object, destination), mIds.of(*source->object), id, nameOf(*source));
         for (const PropertyData* property : destination.data().properties())
             for (const ConnectionPoint* source : property->plug.sources)
-                add(kOthers, idOf(*source->object), id, nameOf(*source), propertyName(destination, property->index));
+                add(kOthers, mIds.of(*source->object), id, nameOf(*source), propertyName(destination, property->index));
         if (const auto* node = FbxCast<FbxAnimCurveNode>(&destination))
             writeChannels(*node, id);
     }
@@ -143,7 +158,7 @@ private:
         for (unsigned int channel = 0; channel < node.GetChannelsCount(); ++channel) {
             const int count = node.GetCurveCount(channel);
             for (int i = 0; i < count; ++i) {
-                add(kCurves, idOf(*node.GetCurve(channel, static_cast<unsigned int>(i))), id, {},
+                add(kCurves, mIds.of(*node.GetCurve(channel, static_cast<unsigned int>(i))), id, {},
                     mTexts.channel(node.GetChannelName(static_cast<int>(channel)).Buffer()));
             }
         }
@@ -163,7 +178,7 @@ private:
     }
 
     FbxScene& mScene;
-    const std::unordered_map<const FbxObject*, std::int64_t>& mIds;
+    const FileIds& mIds;
     std::vector<DocumentConnection>& mConnections;
     CommonTexts& mTexts;
     std::array<std::vector<DocumentConnection>, kRanks> mRanked;
@@ -225,12 +240,7 @@ void writeTakes(const std::vector<ChosenObject>& objects, Document& document) {
 
 void writeScene(FbxScene& scene, const VersionTraits& traits, Document& document) {
     const std::vector<ChosenObject> objects = ObjectChoice(scene, traits).choose();
-    std::unordered_map<const FbxObject*, std::int64_t> ids;
-    ids.reserve(objects.size());
-    std::int64_t lastId = 0;
-    document.id = ++lastId;
-    for (const ChosenObject& chosen : objects)
-        ids.emplace(chosen.object, ++lastId);
+    document.id = 1;
     document.activeStackName = scene.ActiveAnimStackName.Get().Buffer();
     auto owned = std::make_unique<ClassOutputs>(*document.tree, traits);
     ClassOutputs& classes = *owned;
@@ -240,9 +250,9 @@ void writeScene(FbxScene& scene, const VersionTraits& traits, Document& document
     document.objects.reserve(objects.size());
     for (const ChosenObject& chosen : objects) {
         document.objects.push_back(writableObject(*chosen.object, classes.of(*chosen.object, *chosen.schema)));
-        document.objects.back().id = ids.at(chosen.object);
+        document.objects.back().id = document.id + static_cast<std::int64_t>(document.objects.size());
     }
-    ConnectionWriter(scene, ids, document.connections, classes.texts()).write(objects);
+    ConnectionWriter(scene, FileIds(objects, document.id + 1), document.connections, classes.texts()).write(objects);
     writeTakes(objects, document);
 }
 
