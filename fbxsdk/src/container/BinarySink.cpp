@@ -241,11 +241,11 @@ void BinarySink::repeat(const EncodedRecords& records) {
     const std::uint64_t place = mWindow.size();
     char* const bytes = mWindow.extend(records.bytes.size());
     std::copy(records.bytes.begin(), records.bytes.end(), bytes);
-    for (const std::uint32_t head : records.places) {
-        if (mIsFragment)
-            mHeads.push_back(place + head);
+    for (const std::uint32_t head : records.places)
         moveHead(bytes + head, place);
-    }
+    if (mIsFragment)
+        for (const std::uint32_t head : records.places)
+            mHeads.push_back(place + head);
     checkSize(mWindow.size());
 }
 

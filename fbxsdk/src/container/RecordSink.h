@@ -64,7 +64,7 @@ public:
 
     /// Writes whole records, one after the other.
     using Part = std::function<void(RecordSink& sink)>;
-    /// A few short records as the sink writes them, to be written many times.
+    /// Short records, less than 64 KiB in all, as the sink writes them, to be written many times.
     struct EncodedRecords {
         std::string bytes;
         std::vector<std::uint32_t> places; ///< of records in the bytes, where their position matters

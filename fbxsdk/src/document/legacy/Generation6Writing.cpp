@@ -4,6 +4,8 @@
 // Files of version 6.1: objects are identified by name and list all their properties, a Model holds its attribute, and
 // the animation is in takes. The inverse of Generation6Reading.
 #include <algorithm>
+#include <map>
+#include <utility>
 
 #include "document/DocumentSections.h"
 #include "document/PropertyNames.h"
@@ -48,7 +50,7 @@ std::size_t rankIn(const std::string_view (&order)[size], std::string_view recor
     return static_cast<std::size_t>(std::find(std::begin(order), std::end(order), record) - std::begin(order));
 }
 
-/// Lines of objects as records, each of them encoded once where many objects have it.
+/// Lines of objects as records. Runs of them that many objects have are encoded once.
 class LineWriter {
 public:
     /// Properties of objects of that subclass; of attributes inside Models if so.
@@ -61,56 +63,74 @@ public:
     /// Those with other names here are last.
     void write(std::span<const WrittenLine> lines, RecordSink& sink) {
         mRenamed.clear();
-        for (const WrittenLine& line : lines)
-            if (line.number == WrittenLine::kUnique)
-                writeUnique(line, sink);
+        while (!lines.empty()) {
+            const std::size_t count = runLength(lines);
+            if (lines.front().number == WrittenLine::kUnique)
+                writeOne(*lines.front().property, sink, mRenamed);
             else
-                writeShared(line, sink);
+                writeShared(lines.first(count), sink);
+            lines = lines.subspan(count);
+        }
         for (const DocumentProperty* property : mRenamed)
             writeRecord(*property, sink);
     }
 
 private:
-    enum class Way : std::uint8_t { unknown, left, renamed, encoded };
-    struct Shared {
-        Way way = Way::unknown;
+    using Properties = std::vector<const DocumentProperty*>;
+
+    /// Lines with consecutive numbers.
+    struct Run {
         RecordSink::EncodedRecords records;
+        Properties renamed;
     };
 
-    void writeUnique(const WrittenLine& line, RecordSink& sink) {
-        const DocumentProperty& property = *line.property;
-        switch (wayOf(property)) {
-        case Way::left:
-            break;
-        case Way::renamed:
-            mRenamed.push_back(&property);
-            break;
-        default:
-            writeRecord(property, sink);
+    /// Of further runs each line is one: objects may leave out any of a class's lines.
+    static constexpr std::size_t kMostLongRuns = 256;
+
+    static std::size_t runLength(std::span<const WrittenLine> lines) {
+        std::size_t count = 1;
+        while (count < lines.size() && lines[count].number == lines[count - 1].number + 1)
+            ++count;
+        return count;
+    }
+
+    void writeShared(std::span<const WrittenLine> lines, RecordSink& sink) {
+        const auto known = mRuns.find({lines.front().number, lines.size()});
+        if (known != mRuns.end()) {
+            repeat(known->second, sink);
+        } else if (lines.size() == 1 || mLongRuns < kMostLongRuns) {
+            const std::pair key(lines.front().number, lines.size());
+            repeat(mRuns.emplace(key, encoded(lines, sink)).first->second, sink);
+            if (lines.size() > 1)
+                ++mLongRuns;
+        } else {
+            for (std::size_t i = 0; i < lines.size(); ++i)
+                writeShared(lines.subspan(i, 1), sink);
         }
     }
 
-    void writeShared(const WrittenLine& line, RecordSink& sink) {
-        const auto number = static_cast<std::size_t>(line.number);
-        if (mShared.size() <= number)
-            mShared.resize(number + 1);
-        Shared& shared = mShared[number];
-        if (shared.way == Way::unknown) {
-            shared.way = wayOf(*line.property);
-            if (shared.way == Way::encoded)
-                shared.records = sink.encoded([&](RecordSink& target) { writeRecord(*line.property, target); });
-        }
-        if (shared.way == Way::encoded)
-            sink.repeat(shared.records);
-        else if (shared.way == Way::renamed)
-            mRenamed.push_back(line.property);
+    [[nodiscard]] Run encoded(std::span<const WrittenLine> lines, const RecordSink& sink) {
+        Run run;
+        run.records = sink.encoded([&](RecordSink& target) {
+            for (const WrittenLine& line : lines)
+                writeOne(*line.property, target, run.renamed);
+        });
+        return run;
     }
 
-    [[nodiscard]] Way wayOf(const DocumentProperty& property) const {
+    void repeat(const Run& run, RecordSink& sink) {
+        if (!run.records.bytes.empty())
+            sink.repeat(run.records);
+        mRenamed.insert(mRenamed.end(), run.renamed.begin(), run.renamed.end());
+    }
+
+    void writeOne(const DocumentProperty& property, RecordSink& sink, Properties& renamed) {
         if (goesWithoutSaying(property))
-            return Way::left;
-        const bool isRenamed = mInModel && legacyPropertyName(mSubClass, property.name) != property.name;
-        return isRenamed ? Way::renamed : Way::encoded;
+            return;
+        if (mInModel && legacyPropertyName(mSubClass, property.name) != property.name)
+            renamed.push_back(&property);
+        else
+            writeRecord(property, sink);
     }
 
     /// Properties of an attribute inside a Model are marked by a letter.
@@ -124,8 +144,9 @@ private:
 
     std::string_view mSubClass;
     bool mInModel;
-    std::vector<Shared> mShared; ///< by the number of a line
-    std::vector<const DocumentProperty*> mRenamed;
+    std::map<std::pair<int, std::size_t>, Run> mRuns; ///< by the number of the first line and their count
+    std::size_t mLongRuns = 0;                        ///< of these the ones with several lines
+    Properties mRenamed;
     std::string mFlags;
 };
 
