@@ -187,6 +187,13 @@ GlobalSampler::GlobalSampler(FbxSdk& sdk, const TnFbxTime& range) : mSdk(sdk), m
 
 GlobalSampler::~GlobalSampler() = default;
 
+void GlobalSampler::clear() {
+    mNodes.clear();
+    mNext = 0;
+    mTaken.reset();
+    mDepth = 1;
+}
+
 void GlobalSampler::add(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& geometric) {
     const Ancestry ancestry = ancestryOf(node);
     mDepth = std::max(mDepth, ancestry.depth);
@@ -196,18 +203,19 @@ void GlobalSampler::add(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& geometr
 
 /// Only animation by curves is evaluated, not other drivers of a node such as constraints.
 GlobalSampler::Ancestry GlobalSampler::ancestryOf(const fbxsdk::FbxNode& node) {
-    std::vector<const fbxsdk::FbxNode*> unknown;
+    mUnknown.clear();
     Ancestry ancestry;
     for (const fbxsdk::FbxNode* each = &node; each != nullptr; each = each->GetParent()) {
         if (const auto known = mAncestries.find(each); known != mAncestries.end()) {
             ancestry = known->second;
             break;
         }
-        unknown.push_back(each);
+        mUnknown.push_back(each);
     }
-    for (auto each = unknown.rbegin(); each != unknown.rend(); ++each) {
+    for (auto each = mUnknown.rbegin(); each != mUnknown.rend(); ++each) {
         ancestry = {ancestry.isStill && !isAnimated(**each), ancestry.depth + 1};
-        mAncestries.emplace(*each, ancestry);
+        if ((*each)->GetChildCount() > 0)
+            mAncestries.emplace(*each, ancestry);
     }
     return ancestry;
 }

@@ -37,6 +37,9 @@ public:
     GlobalSampler(const GlobalSampler&) = delete;
     GlobalSampler& operator=(const GlobalSampler&) = delete;
 
+    /// Forgets the nodes that were added. What is known of their ancestors serves the next ones.
+    void clear();
+
     /// Parents before their children. `geometric` is multiplied from the right.
     void add(fbxsdk::FbxNode& node, const fbxsdk::FbxAMatrix& geometric);
 
@@ -72,7 +75,8 @@ private:
     std::size_t mNext = 0; // to be returned
     std::unique_ptr<MovingNode> mTaken;
     GlobalRuns mStillRuns; // of the node that was taken last, if it does not move
-    std::unordered_map<const fbxsdk::FbxNode*, Ancestry> mAncestries;
+    std::unordered_map<const fbxsdk::FbxNode*, Ancestry> mAncestries; // of nodes with children
+    std::vector<const fbxsdk::FbxNode*> mUnknown;
     int mDepth = 1;
     std::vector<fbxsdk::FbxAMatrix> mMatrices; // of some frames
 };

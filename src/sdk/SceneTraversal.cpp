@@ -19,8 +19,10 @@
 #include <algorithm>
 #include <cstdint>
 #include <iterator>
+#include <memory>
 #include <string>
 #include <type_traits>
+#include <utility>
 
 namespace Tarnell::Fbx {
 
@@ -202,8 +204,9 @@ struct Walk {
     const std::string& objectName;
     Object* objects;
     int capacity;
-    int& index;  // the next free element
-    bool& found; // the requested object was read
+    int& index;                                      // the next free element
+    bool& found;                                     // the requested object was read
+    std::unique_ptr<detail::GlobalSampler>& globals; // of one subtree after the other; made when it is needed
 };
 
 template <class Object>
@@ -238,33 +241,35 @@ bool visitNode(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode& node) {
 template <class Object>
 constexpr bool kIsPlacedInWorld = !std::is_same_v<Object, TnFbxCamera>;
 
-/// The sampler of everything that a traversal will read in the world; null when that is nothing.
+/// Adds everything that a traversal will read in the world to its sampler; without a sampler when that is nothing.
 template <class Object>
-std::unique_ptr<detail::GlobalSampler> globalsOf(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode* top) {
+void addGlobals(FbxSdk& sdk, const Walk<Object>& walk, fbxsdk::FbxNode* top) {
     if (!kIsPlacedInWorld<Object> || !walk.flags.globalTransform || walk.time.getStartFrame() > walk.time.getEndFrame())
-        return nullptr;
-    auto globals = std::make_unique<detail::GlobalSampler>(sdk, walk.time);
+        return;
+    if (walk.globals == nullptr)
+        walk.globals = std::make_unique<detail::GlobalSampler>(sdk, walk.time);
+    walk.globals->clear();
     int room = walk.capacity - walk.index;
     detail::walkNodes(top, [&](fbxsdk::FbxNode& node) {
         const bool isRead =
             (typeBit(node) & kKind<Object>.types) != 0 && (walk.allObjects || walk.objectName == node.GetName());
         if (isRead)
-            globals->add(node, geometricOffset<Object>(node));
+            walk.globals->add(node, geometricOffset<Object>(node));
         return !isRead || (walk.allObjects && --room > 0);
     });
-    return globals;
 }
 
-/// Sets a value until the scope ends, also by an exception.
+/// Moves a value to another place until the scope ends, also by an exception.
 template <class Value>
-class Temporarily {
+class Lent {
 public:
-    Temporarily(Value& place, Value value) : mPlace(place) { mPlace = std::move(value); }
-    ~Temporarily() { mPlace = Value(); }
-    Temporarily(const Temporarily&) = delete;
-    Temporarily& operator=(const Temporarily&) = delete;
+    Lent(Value& owner, Value& place) : mOwner(owner), mPlace(place) { mPlace = std::move(mOwner); }
+    ~Lent() { mOwner = std::move(mPlace); }
+    Lent(const Lent&) = delete;
+    Lent& operator=(const Lent&) = delete;
 
 private:
+    Value& mOwner;
     Value& mPlace;
 };
 
@@ -276,7 +281,8 @@ bool FbxSdk::walkSubtree(const Walk& walk, fbxsdk::FbxNode* top) {
     if (walk.objects == nullptr)
         return fail("no array to read into");
     const detail::ReadScope scope(*this);
-    const Temporarily globals(mGlobals, globalsOf(*this, walk, top));
+    addGlobals(*this, walk, top);
+    const Lent globals(walk.globals, mGlobals);
     if (mGlobals != nullptr)
         mGlobals->sample(*mSamples);
     bool hasRoom = true;
@@ -378,7 +384,9 @@ bool FbxSdk::readList(TnFbxReadInfo& info, Object* objects, int count) {
     bool found = false;
     const ReadFlags flags = {info.getGlobalTransform(), info.getUseSampleFPS(), info.getSampleFPS(),
                              info.getComputeCameraRotation(), info.getTransformPoints()};
-    const Walk<Object> walk = {time, flags, info.getAllObjects(), info.getObjectName(), objects, count, index, found};
+    std::unique_ptr<detail::GlobalSampler> globals;
+    const Walk<Object> walk = {time,  flags,  info.getAllObjects(), info.getObjectName(), objects, count, index,
+                               found, globals};
     bool result = succeed();
     fbxsdk::FbxNode* root = mScene->GetRootNode();
     for (int i = 0; root != nullptr && result && !found && i < root->GetChildCount(); ++i)
@@ -434,43 +442,53 @@ bool FbxSdk::getMeshesRecursive(TnFbxTime& time, bool globalTransform, bool useS
                                 bool allObjects, bool transformPoints, const std::string& objectName,
                                 fbxsdk::FbxNode* node, int& index, TnFbxMesh* meshes, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, transformPoints};
-    return walkSubtree(Walk<TnFbxMesh>{time, flags, allObjects, objectName, meshes, count, index, found}, node);
+    std::unique_ptr<detail::GlobalSampler> globals;
+    return walkSubtree(Walk<TnFbxMesh>{time, flags, allObjects, objectName, meshes, count, index, found, globals},
+                       node);
 }
 
 bool FbxSdk::getCamerasRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                  bool computeCameraRotation, bool allObjects, const std::string& objectName,
                                  fbxsdk::FbxNode* node, int& index, TnFbxCamera* cameras, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, computeCameraRotation, false};
-    return walkSubtree(Walk<TnFbxCamera>{time, flags, allObjects, objectName, cameras, count, index, found}, node);
+    std::unique_ptr<detail::GlobalSampler> globals;
+    return walkSubtree(Walk<TnFbxCamera>{time, flags, allObjects, objectName, cameras, count, index, found, globals},
+                       node);
 }
 
 bool FbxSdk::getLightsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                 bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                                 TnFbxLight* lights, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
-    return walkSubtree(Walk<TnFbxLight>{time, flags, allObjects, objectName, lights, count, index, found}, node);
+    std::unique_ptr<detail::GlobalSampler> globals;
+    return walkSubtree(Walk<TnFbxLight>{time, flags, allObjects, objectName, lights, count, index, found, globals},
+                       node);
 }
 
 bool FbxSdk::getMarkersRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                  bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                                  TnFbxMarker* markers, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
-    return walkSubtree(Walk<TnFbxMarker>{time, flags, allObjects, objectName, markers, count, index, found}, node);
+    std::unique_ptr<detail::GlobalSampler> globals;
+    return walkSubtree(Walk<TnFbxMarker>{time, flags, allObjects, objectName, markers, count, index, found, globals},
+                       node);
 }
 
 bool FbxSdk::getNullsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                                TnFbxNull* nulls, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
-    return walkSubtree(Walk<TnFbxNull>{time, flags, allObjects, objectName, nulls, count, index, found}, node);
+    std::unique_ptr<detail::GlobalSampler> globals;
+    return walkSubtree(Walk<TnFbxNull>{time, flags, allObjects, objectName, nulls, count, index, found, globals}, node);
 }
 
 bool FbxSdk::getTransformsRecursive(TnFbxTime& time, bool globalTransform, bool useSampleFPS, float sampleFPS,
                                     bool allObjects, const std::string& objectName, fbxsdk::FbxNode* node, int& index,
                                     TnFbxTransform* transforms, int count, bool& found) {
     const ReadFlags flags = {globalTransform, useSampleFPS, sampleFPS, false, false};
-    return walkSubtree(Walk<TnFbxTransform>{time, flags, allObjects, objectName, transforms, count, index, found},
-                       node);
+    std::unique_ptr<detail::GlobalSampler> globals;
+    return walkSubtree(
+        Walk<TnFbxTransform>{time, flags, allObjects, objectName, transforms, count, index, found, globals}, node);
 }
 
 } // namespace Tarnell::Fbx

@@ -15,6 +15,7 @@
 
 #include <array>
 #include <cmath>
+#include <optional>
 
 namespace Tarnell::Fbx {
 
@@ -79,11 +80,12 @@ bool FbxSdk::getTransform(TnFbxTime& time, bool global, bool useSampleFPS, float
 void FbxSdk::storeGlobalTransform(const TnFbxTime& time, fbxsdk::FbxNode& node, fbxsdk::FbxAMatrix& geometric,
                                   TnFbxTransform& transform) {
     detail::GlobalRuns* runs = mGlobals != nullptr ? mGlobals->take(node, geometric) : nullptr;
-    detail::GlobalSampler alone(*this, time);
+    std::optional<detail::GlobalSampler> alone;
     if (runs == nullptr) {
-        alone.add(node, geometric);
-        alone.sample(*mSamples);
-        runs = alone.take(node, geometric);
+        alone.emplace(*this, time);
+        alone->add(node, geometric);
+        alone->sample(*mSamples);
+        runs = alone->take(node, geometric);
     }
     int channel = TnFbxTransform::kFbxTransformPositionX;
     for (detail::SampleRun& run : *runs) {

@@ -142,12 +142,12 @@ Components combine(const Components& below, const Components& layer, const FbxAn
 AnimatedProperty bindAnimation(const FbxProperty& property, FbxAnimStack* stack) {
     AnimatedProperty animation;
     animation.property = property;
-    animation.rule = ruleOf(property.GetNameAsCStr());
     const FbxDouble4 value = property.Get<FbxDouble4>();
     animation.staticValue = {value[0], value[1], value[2], value[3]};
     if (!stack || property.GetSrcObjectCount() == 0)
         return animation;
 
+    animation.rule = ruleOf(property.GetNameAsCStr());
     const std::vector<FbxAnimLayer*> layers = sourcesOf<FbxAnimLayer>(*stack);
     const std::vector<FbxAnimCurveNode*> curveNodes = sourcesOf<FbxAnimCurveNode>(property);
     const bool soloOnly = std::any_of(layers.begin(), layers.end(), [](auto* layer) { return layer->Solo.Get(); });

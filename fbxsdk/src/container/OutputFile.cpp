@@ -20,6 +20,8 @@ namespace detail {
 namespace {
 
 constexpr std::size_t kBufferBytes = std::size_t{1} << 18;
+/// Pieces from this size on are written as they are.
+constexpr std::size_t kDirectBytes = std::size_t{1} << 15;
 /// Names that are tried for a file of our own before giving up.
 constexpr int kMostNames = 1000;
 /// Follows the last name that was used, so that thousands of files next to each other do not try each other's names.
@@ -148,7 +150,7 @@ int OutputFile::openSpool() {
 void OutputFile::write(std::span<const char> bytes) {
     if (failed())
         return;
-    if (bytes.size() >= kBufferBytes) {
+    if (bytes.size() >= kDirectBytes) {
         flushBuffer();
         sendBuffer(bytes);
         return;

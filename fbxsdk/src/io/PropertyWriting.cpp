@@ -166,11 +166,12 @@ void addLines(const FbxObject& object, PropertyChoice choice, const DefaultLines
         const PropertyData* const property = isStored ? *next++ : nullptr;
         const DocumentProperty* const line =
             index < rowCount ? &defaults.lines[static_cast<std::size_t>(index)] : nullptr;
-        if (!property)
-            lines.refer(*line, defaults.firstNumber + index);
-        else if ((property->flags & FbxPropertyFlags::eNotSavable) == 0 &&
-                 (choice == PropertyChoice::all || isChanged(*property)))
+        if (property && (property->flags & FbxPropertyFlags::eNotSavable) != 0)
+            continue;
+        if (property && isChanged(*property))
             lines.add(writableLine(*property, line ? line->name : std::string_view(property->name), texts, lines));
+        else if (choice == PropertyChoice::all)
+            lines.refer(*line, defaults.firstNumber + index);
     }
 }
 

@@ -141,6 +141,8 @@ ConnectionList::Selection* ConnectionList::selectionOf(const FbxCriteria* criter
 }
 
 int ConnectionList::count(const FbxCriteria* criteria) const {
+    if (mPoints.empty())
+        return 0;
     if (const Selection* selection = selectionOf(criteria))
         return static_cast<int>(selection->found.size());
     return static_cast<int>(std::count_if(mPoints.begin(), mPoints.end(),
