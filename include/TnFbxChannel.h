@@ -79,6 +79,8 @@ public:
     /// Outside the range the end samples hold. Within it the sample of the frame truncated toward zero is joined to the
     /// next one, so that a fractional frame below zero is an extrapolation from the two samples to its right.
     float getAnimatedValue(float frame) const;
+    /// The same at `count` whole frames, one after the other.
+    void getAnimatedValues(int firstFrame, std::size_t count, float* values) const;
 
     bool getAnimated() const;  ///< Whether there are samples.
     TnFbxTime getTime() const; ///< A copy of the time record.

@@ -4,16 +4,22 @@
 // Warnings about values that are not finite, invalid rates, and inconsistent meshes.
 #include "WriteChecks.h"
 
+#include "FrameTimes.h"
 #include "calls/LastError.h"
 
+#include <algorithm>
+#include <array>
 #include <cmath>
+#include <cstddef>
 #include <cstdint>
 #include <cstdio>
+#include <span>
 
 namespace Tarnell::Fbx {
 
 namespace {
 
+using detail::kMostTogether;
 using detail::ObjectWarnings;
 
 constexpr const char* kNoNumbers = "values that are not finite are written unchanged, in ASCII files as 0";
@@ -25,9 +31,15 @@ bool hasFiniteSamples(const TnFbxChannel& channel) {
     const TnFbxTime range = channel.getTime();
     if (channel.isConstant())
         return std::isfinite(channel.getAnimatedValue(static_cast<float>(range.getStartFrame())));
-    for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame(); ++frame)
-        if (!std::isfinite(channel.getAnimatedValue(static_cast<float>(frame))))
+    std::array<float, kMostTogether> values;
+    for (std::int64_t frame = range.getStartFrame(); frame <= range.getEndFrame();) {
+        const auto left = static_cast<std::size_t>(range.getEndFrame() - frame + 1);
+        const std::span<float> some = std::span(values).first(std::min(left, values.size()));
+        channel.getAnimatedValues(static_cast<int>(frame), some.size(), some.data());
+        if (!std::all_of(some.begin(), some.end(), [](float value) { return std::isfinite(value); }))
             return false;
+        frame += static_cast<std::int64_t>(some.size());
+    }
     return true;
 }
 

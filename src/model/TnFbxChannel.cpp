@@ -229,6 +229,22 @@ float TnFbxChannel::getAnimatedValue(float frame) const {
     return sample + (clamped - wholeFrame) * (next - sample);
 }
 
+void TnFbxChannel::getAnimatedValues(int firstFrame, std::size_t count, float* values) const {
+    constexpr auto kFirstInexact = static_cast<std::int64_t>(kFirstInexactFrame);
+    const std::int64_t index = std::int64_t{firstFrame} - mTime.getStartFrame();
+    const std::int64_t end = std::int64_t{firstFrame} + static_cast<std::int64_t>(count);
+    const bool areSamples = index >= 0 && end - mTime.getStartFrame() <= static_cast<std::int64_t>(mCount) &&
+                            end <= std::int64_t{mTime.getEndFrame()} + 1 && firstFrame > -kFirstInexact &&
+                            end <= kFirstInexact;
+    if (!areSamples)
+        for (std::int64_t frame = firstFrame; frame < end; ++frame)
+            *values++ = getAnimatedValue(static_cast<float>(frame));
+    else if (mValues.empty())
+        std::fill_n(values, count, mCommonValue);
+    else
+        std::copy_n(mValues.begin() + index, count, values);
+}
+
 bool TnFbxChannel::getAnimated() const { return mAnimated; }
 
 TnFbxTime TnFbxChannel::getTime() const { return mTime; }

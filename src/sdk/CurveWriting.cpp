@@ -51,8 +51,9 @@ void addKeys(fbxsdk::FbxAnimCurve& curve, const TnFbxChannel& channel, float sca
     frameTimes.begin(range.getStartFrame(), static_cast<double>(range.getFrameRate()));
     std::array<float, detail::kMostTogether> values;
     frameTimes.inPortions(count, [&](std::int64_t frame, std::span<const fbxsdk::FbxTime> times) {
+        channel.getAnimatedValues(static_cast<int>(frame), times.size(), values.data());
         for (std::size_t i = 0; i < times.size(); ++i)
-            values[i] = channel.getAnimatedValue(static_cast<float>(frame + static_cast<std::int64_t>(i))) * scale;
+            values[i] *= scale;
         addLinearKeys(curve, times, values.data());
         return true;
     });

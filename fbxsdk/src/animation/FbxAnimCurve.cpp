@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <iterator>
 
 #include <fbxsdk/FbxAnimCurveNode.h>
 #include <fbxsdk/extensions/CurveSamples.h>
@@ -290,12 +291,15 @@ void extensions::addLinearKeys(FbxAnimCurve& curve, const FbxTime* times, const 
         if (static_cast<std::size_t>(index) + 1 != keys.times.size())
             continue;
         // Those that follow the last key have its attributes.
+        int end = i + 1;
+        while (end < count && times[end - 1] < times[end])
+            ++end;
         const std::uint32_t attribute = keys.attributeOfKey.back();
-        for (; i + 1 < count && keys.times.back() < times[i + 1].Get(); ++i) {
-            keys.times.push_back(times[i + 1].Get());
-            keys.values.push_back(values[i + 1]);
-            keys.attributeOfKey.push_back(attribute);
-        }
+        keys.attributeOfKey.resize(keys.times.size() + static_cast<std::size_t>(end - i - 1), attribute);
+        keys.values.insert(keys.values.end(), values + i + 1, values + end);
+        std::transform(times + i + 1, times + end, std::back_inserter(keys.times),
+                       [](const FbxTime& time) { return time.Get(); });
+        i = end - 1;
     }
 }
 

@@ -29,7 +29,7 @@ constexpr std::size_t kLevelMemory = ISAL_DEF_LVL1_DEFAULT;
 constexpr std::size_t kMostBytesOfACall = std::size_t{1} << 30;
 
 /// Longer arrays hardly repeat and are not cached.
-constexpr std::size_t kMostKeptBytes = std::size_t{1} << 18;
+constexpr std::size_t kMostKeptBytes = std::size_t{1} << 16;
 
 } // namespace
 
@@ -163,18 +163,22 @@ Deflater::~Deflater() = default;
 std::span<const char> Deflater::deflated(std::span<const char> bytes) {
     if (bytes.size() > kMostKeptBytes)
         return deflatedAnew(bytes);
-    if (const Kept* const kept = find(bytes))
-        return kept->stream;
+    ++mUses;
+    if (Kept* const known = find(bytes)) {
+        known->lastUse = mUses;
+        return known->stream;
+    }
     const std::span<const char> stream = deflatedAnew(bytes);
-    Kept& kept = mKept[mOldest];
-    mOldest = (mOldest + 1) % mKept.size();
+    Kept& kept = *std::min_element(mKept.begin(), mKept.end(),
+                                   [](const Kept& a, const Kept& b) { return a.lastUse < b.lastUse; });
+    kept.lastUse = mUses;
     kept.bytes.clear(); // until the stream is complete, it is not found
     kept.stream.assign(stream.begin(), stream.end());
     kept.bytes.assign(bytes.begin(), bytes.end());
     return kept.stream;
 }
 
-const Deflater::Kept* Deflater::find(std::span<const char> bytes) const {
+Deflater::Kept* Deflater::find(std::span<const char> bytes) {
     const auto found = std::find_if(mKept.begin(), mKept.end(), [&](const Kept& kept) {
         return kept.bytes.size() == bytes.size() && std::memcmp(kept.bytes.data(), bytes.data(), bytes.size()) == 0;
     });

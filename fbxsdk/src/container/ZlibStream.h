@@ -39,17 +39,18 @@ public:
 private:
     struct Kept {
         std::vector<char> bytes, stream;
+        std::uint64_t lastUse = 0;
     };
 
-    [[nodiscard]] const Kept* find(std::span<const char> bytes) const;
+    [[nodiscard]] Kept* find(std::span<const char> bytes);
     [[nodiscard]] std::span<const char> deflatedAnew(std::span<const char> bytes);
 
     struct Compressor;
     std::unique_ptr<Compressor> mCompressor;
     std::unique_ptr<char[]> mMemory; ///< of the last stream; reused, never cleared
     std::size_t mMemorySize = 0;
-    std::array<Kept, 8> mKept;
-    std::size_t mOldest = 0; ///< of the cached ones
+    std::array<Kept, 32> mKept;
+    std::uint64_t mUses = 0;
 };
 
 } // namespace detail

@@ -134,6 +134,8 @@ RightAngles rightAnglesIn(double degrees) {
 } // namespace
 
 SinCos sinCosDegrees(double degrees) {
+    if (degrees == 0.0)
+        return {degrees, 1.0}; // as the following gives it, too; most angles of a scene are none
     const auto [quadrant, rest] = rightAnglesIn(degrees);
     const double radians = rest * FBXSDK_PI_DIV_180;
     const double s = std::sin(radians);

@@ -58,18 +58,30 @@ struct PackedAttributes {
     std::vector<std::uint32_t> words;
 };
 
+/// The first key after one that does not have its index of attributes.
+std::size_t endOfRun(const CurveKeys& curve, std::size_t key) {
+    const std::vector<std::uint32_t>& indices = curve.attributeOfKey;
+    if (key >= indices.size())
+        return curve.keyCount();
+    const auto first = indices.begin() + static_cast<std::ptrdiff_t>(key);
+    const auto end = std::find_if(first, indices.end(), [first](std::uint32_t index) { return index != *first; });
+    return std::min(curve.keyCount(), static_cast<std::size_t>(end - indices.begin()));
+}
+
 PackedAttributes packAttributes(const CurveKeys& curve) {
     PackedAttributes packed;
     const KeyAttributes* last = nullptr;
-    for (std::size_t key = 0; key < curve.keyCount(); ++key) {
+    for (std::size_t key = 0, next = 0; key < curve.keyCount(); key = next) {
         const KeyAttributes& attribute = curve.attributesOf(key);
+        next = endOfRun(curve, key);
+        const auto count = static_cast<std::int32_t>(next - key);
         if (&attribute == last) {
-            ++packed.counts.back();
+            packed.counts.back() += count;
             continue;
         }
         last = &attribute;
         packed.flags.push_back(std::bit_cast<std::int32_t>(attribute.flags));
-        packed.counts.push_back(1);
+        packed.counts.push_back(count);
         packAttribute(attribute, packed.words);
     }
     return packed;

@@ -6,6 +6,8 @@
 #include "io/SceneWriting.h"
 
 #include <algorithm>
+#include <bit>
+#include <cstdint>
 #include <string>
 
 #include <fbxsdk/FbxAnimCurveNode.h>
@@ -116,6 +118,12 @@ bool isChanged(const PropertyData& data) {
            (data.flags & kWritten) != (defaultFlags(*data.row) & kWritten);
 }
 
+/// Whether the line of the class is that of the property, too: a negative zero is written as such.
+bool isSame(const PropertyData& data) {
+    const auto bitsOf = [](double number) { return std::bit_cast<std::uint64_t>(number); };
+    return !isChanged(data) && std::ranges::equal(data.value.numbers, data.row->numbers, {}, bitsOf, bitsOf);
+}
+
 } // namespace
 
 std::string_view CommonTexts::flags(unsigned flags) {
@@ -168,7 +176,8 @@ void addLines(const FbxObject& object, PropertyChoice choice, const DefaultLines
             index < rowCount ? &defaults.lines[static_cast<std::size_t>(index)] : nullptr;
         if (property && (property->flags & FbxPropertyFlags::eNotSavable) != 0)
             continue;
-        if (property && isChanged(*property))
+        const bool isDefault = !property || (choice == PropertyChoice::all ? isSame(*property) : !isChanged(*property));
+        if (!isDefault)
             lines.add(writableLine(*property, line ? line->name : std::string_view(property->name), texts, lines));
         else if (choice == PropertyChoice::all)
             lines.refer(*line, defaults.firstNumber + index);
