@@ -5,6 +5,7 @@
 #include "TnFbxChannel.h"
 
 #include "ModelValues.h"
+#include "model/SameBits.h"
 
 #include <cmath>
 #include <vector>
@@ -127,6 +128,38 @@ TEST(ChannelEvaluation, WorksAtBothEndsOfTheRangeOfAnInt) {
     highest.setAnimatedValues(range(kHighest - 1, kHighest), {1.0f, 2.0f});
     EXPECT_EQ(highest.getAnimatedValue(kInfinity), 2.0f);
     EXPECT_EQ(highest.getAnimatedValue(0.0f), 2.0f); // the float of the first frame is that of the last
+}
+
+TEST(ChannelEvaluation, GivesManyFramesWhatItGivesEach) {
+    TnFbxChannel keyed = channelOver(-3, {1.0f, 2.0f, -0.0f, kNaN, 5.0f});
+    TnFbxChannel constant, beyond, far, isStatic;
+    constant.setConstantValues(range(-3, 1), 4.0f);
+    beyond.setAnimatedValues(range(-3, -1), {1.0f, 2.0f, 3.0f, 4.0f, 5.0f});
+    far.setAnimatedValues(range(16777214, 16777219), {1.0f, 2.0f, 3.0f, 4.0f, 5.0f, 6.0f});
+    isStatic.setValue(7.0f);
+    for (const TnFbxChannel& channel : {keyed, constant, beyond, far, isStatic}) {
+        for (const int start : {-3, 16777214}) {
+            for (int first = start - 2; first < start + 8; ++first) {
+                for (std::size_t count = 0; count < 10; ++count) {
+                    std::vector<float> values(count + 1, -1.0f);
+                    channel.getAnimatedValues(first, count, values.data());
+                    for (std::size_t i = 0; i < count; ++i)
+                        EXPECT_TRUE(detail::haveSameBits(
+                            values[i], channel.getAnimatedValue(static_cast<float>(first + static_cast<int>(i)))));
+                    EXPECT_EQ(values[count], -1.0f);
+                }
+            }
+        }
+    }
+}
+
+TEST(ChannelEvaluation, GivesFramesUpToTheHighest) {
+    TnFbxChannel channel;
+    channel.setAnimatedValues(range(kHighest - 1, kHighest), {1.0f, 2.0f});
+    std::vector<float> values(2);
+    channel.getAnimatedValues(kHighest - 1, values.size(), values.data());
+    for (const float value : values)
+        EXPECT_EQ(value, channel.getAnimatedValue(static_cast<float>(kHighest)));
 }
 
 TEST(ChannelEvaluation, KeysTheFrameNearestToOneThatNoIntCanHold) {

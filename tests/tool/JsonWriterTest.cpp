@@ -68,6 +68,53 @@ TEST(JsonWriter, WritesMembersInFrontOfAKey) {
     EXPECT_EQ(out.str(), "[{\"v\":0,\"a\":1,\"b\":2,\"c\":3},{\"v\":1,\"a\":1,\"b\":2,\"c\":3}]");
 }
 
+TEST(JsonWriter, RepeatsMembersOfTheObjectBefore) {
+    for (const bool pretty : {false, true}) {
+        std::ostringstream repeated, again;
+        const auto write = [pretty](std::ostream& out, bool repeats) {
+            JsonWriter json(out, pretty);
+            std::string first, second;
+            json.beginArray();
+            for (int i = 0; i < 3; ++i) {
+                const auto member = [&](const char* name, std::string& text) {
+                    if (repeats && i > 0)
+                        return json.repeat(text);
+                    const JsonWriter::Place place = json.place();
+                    json.key(name);
+                    json.beginArray();
+                    json.real(0.5F);
+                    json.endArray();
+                    text = json.since(place);
+                };
+                json.beginObject();
+                member("a", first);
+                member("b", second);
+                json.integer("c", i);
+                json.endObject();
+            }
+            json.endArray();
+        };
+        write(repeated, true);
+        write(again, false);
+        EXPECT_EQ(repeated.str(), again.str());
+    }
+}
+
+TEST(JsonWriter, GivesNothingBackOnceItIsInTheStream) {
+    std::ostringstream out;
+    JsonWriter json(out, false);
+    json.beginArray();
+    JsonWriter::Place place = json.place();
+    json.text("a");
+    EXPECT_EQ(json.since(place), "\"a\"");
+    json.text(std::string(65'530, 'x'));
+    EXPECT_EQ(json.since(place), "");
+    place = json.place();
+    json.text(std::string(1'000'000, 'y'));
+    EXPECT_EQ(json.since(place), "");
+    json.endArray();
+}
+
 TEST(JsonWriter, WritesTextsOfAnySizeAcrossItsBlocks) {
     std::string expected = "[";
     std::ostringstream out;

@@ -47,6 +47,23 @@ TEST(ZlibStream, GivesEachOfManyStreamsItsContentHoweverOften) {
     }
 }
 
+TEST(ZlibStream, GivesEachOfManyContentsItsStreamHoweverOften) {
+    constexpr std::size_t kContents = 50; // more than are kept
+    std::vector<std::string> contents, streams;
+    for (std::size_t i = 0; i < kContents; ++i) {
+        contents.push_back(contentOf(static_cast<int>(i), 1000 + i));
+        streams.push_back(streamOf(contents.back()));
+    }
+    Deflater deflater;
+    for (const std::size_t step : {1U, 0U, 3U, 7U}) {
+        for (std::size_t i = 0; i < 3 * kContents; ++i) {
+            const std::size_t number = i * step % kContents;
+            const auto stream = deflater.deflated(contents[number]);
+            ASSERT_EQ(std::string(stream.begin(), stream.end()), streams[number]);
+        }
+    }
+}
+
 TEST(ZlibStream, RefusesADamagedStreamBesideASoundOne) {
     const std::string content = contentOf(1), stream = streamOf(content);
     ASSERT_EQ(inflated(stream, content.size()), content);

@@ -6,7 +6,9 @@
 #include "io/SceneWriting.h"
 
 #include <algorithm>
+#include <cmath>
 #include <memory>
+#include <sstream>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -28,6 +30,7 @@
 #include "ExportFixture.h"
 #include "container/Record.h"
 #include "schema/PropertyTypes.h"
+#include "schema/Schema.h"
 
 namespace {
 
@@ -269,6 +272,56 @@ TEST_F(WrittenRecords, OfOldFilesHaveNoNewerPropertyThatGoesWithoutSaying) {
     node->FindProperty("Visibility Inheritance").Set(false);
     light->FindProperty("LeftBarnDoor").Set(5.0);
     EXPECT_THAT(propertyNames(object(records(kOldText), "Model", "Light")), newer);
+}
+
+TEST_F(WrittenRecords, OfOldFilesListEveryPropertyWhicheverOfThemDiffer) {
+    constexpr double kOther = 7.5;
+    std::vector<const char*> numbers;
+    for (const detail::PropertyRow& row : detail::kNodeRows)
+        if (row.type->GetType() == eFbxDouble)
+            numbers.push_back(row.name);
+    ASSERT_GE(numbers.size(), 20U); // so that the lines in between are more runs than are kept
+    const FbxNode* plain = addNode("plain");
+    for (std::size_t first = 0; first < numbers.size(); ++first) {
+        for (std::size_t second = first; second < numbers.size(); ++second) {
+            FbxNode* node = addNode((std::to_string(first) + ' ' + std::to_string(second)).c_str());
+            node->FindProperty(numbers[first]).Set(kOther);
+            node->FindProperty(numbers[second]).Set(kOther);
+        }
+    }
+
+    for (const Layout& layout : {kOldText, kOldBinary}) {
+        FbxScene* copy = writeAndRead(layout);
+        const Record& objects = *records(layout).child("Objects");
+        const Names all = propertyNames(*objects.child("Model"));
+        for (const Record& each : objects.children())
+            ASSERT_TRUE(each.name != "Model" || propertyNames(each) == all) << each.value(0).toText();
+        for (int i = 1; i < copy->GetRootNode()->GetChildCount(); ++i) {
+            FbxNode* node = copy->GetRootNode()->GetChild(i);
+            std::size_t first = 0, second = 0;
+            std::istringstream(node->GetName()) >> first >> second;
+            for (std::size_t number = 0; number < numbers.size(); ++number)
+                ASSERT_EQ(node->FindProperty(numbers[number]).Get<FbxDouble>(),
+                          number == first || number == second ? kOther
+                                                              : plain->FindProperty(numbers[number]).Get<FbxDouble>())
+                    << node->GetName();
+        }
+    }
+}
+
+TEST_F(WrittenRecords, OfOldFilesKeepNegativeZeros) {
+    FbxNode* node = addNode("node");
+    node->LclRotation.Set({1.0, 1.0, 1.0});
+    node->LclRotation.Set({0.0, -0.0, 0.0});
+
+    for (const Layout& layout : {kOldText, kOldBinary}) {
+        const Record* property = records(layout).child("Objects")->child("Model")->child("Properties60")->firstChild;
+        while (property && property->value(0).toText() != "Lcl Rotation")
+            property = property->nextSibling;
+        ASSERT_NE(property, nullptr);
+        EXPECT_FALSE(std::signbit(property->value(3).toReal()));
+        EXPECT_TRUE(std::signbit(property->value(4).toReal()));
+    }
 }
 
 TEST_F(WrittenRecords, OfAnOldLightEndWithTheAngles) {

@@ -85,7 +85,7 @@ private:
     };
 
     /// Of further runs each line is one: objects may leave out any of a class's lines.
-    static constexpr std::size_t kMostLongRuns = 256;
+    static constexpr std::size_t kMostLongRuns = 64;
 
     static std::size_t runLength(std::span<const WrittenLine> lines) {
         std::size_t count = 1;
