@@ -29,7 +29,7 @@ constexpr std::size_t kLevelMemory = ISAL_DEF_LVL1_DEFAULT;
 constexpr std::size_t kMostBytesOfACall = std::size_t{1} << 30;
 
 /// Longer arrays hardly repeat and are not cached.
-constexpr std::size_t kMostKeptBytes = std::size_t{1} << 16;
+constexpr std::size_t kMostKeptBytes = std::size_t{1} << 17;
 
 } // namespace
 
