@@ -99,10 +99,10 @@ TEST(ZlibStream, HasTheBytesOfContentsOfAnySize) {
                 c = static_cast<char>(random() % kinds);
             const auto stream = deflater.deflated(content);
             ASSERT_LT(stream.size(), content.size());
-            if (kinds == 256)
-                EXPECT_TRUE(stream.empty()) << size << ": noise does not become smaller";
-            else if (size > 100)
-                EXPECT_EQ(inflated({stream.begin(), stream.end()}, size), content) << size << ' ' << kinds;
+            EXPECT_TRUE(kinds != 256 || stream.empty()) << size << ": noise does not become smaller";
+            const bool mustShrink = kinds != 256 && size > 100;
+            EXPECT_TRUE(!mustShrink || inflated({stream.begin(), stream.end()}, size) == content)
+                << size << ' ' << kinds;
         }
     }
 }
