@@ -90,7 +90,8 @@ TEST(NumberBlocks, CountsNumbersOfAllSpellings) {
 
 TEST(NumberBlocks, StopsBeforeTheFirstCharacterOutOfPlace) {
     std::mt19937 random(5);
-    constexpr std::string_view kCharacters("0123456789,,,...+-eE \n\r\t;:{}a\"\0\x80\xff/", 38);
+    using std::string_view_literals::operator""sv; // with the zero
+    constexpr auto kCharacters = "0123456789,,,...+-eE \n\r\t;:{}a\"\0\x80\xff/"sv;
     for (int i = 0; i < 20'000; ++i) {
         std::string text = randomList(random, 40);
         for (auto count = random() % 3 + 1; count > 0; --count)
