@@ -149,6 +149,30 @@ TEST(MeshConstruction, WritesColoursByPolygonVertexWithIndicesThatCount) {
     EXPECT_EQ(colours->GetIndexArray().GetAt(2), 2);
 }
 
+TEST(MeshConstruction, WritesTheDefaultsOfWhatIsNotSet) {
+    TnFbxMesh source;
+    ASSERT_TRUE(source.allocateGeometryData(1, 3, 3));
+    source.setPolygonVertexSize(0, 3);
+    source.setValidNormals(true);
+    source.setValidUVs(true);
+    source.setValidColours(true);
+
+    const Constructed made(source);
+
+    float x = 0, y = 0, z = 0, u = 0, v = 0, red = 0, green = 0, blue = 0, alpha = 0;
+    for (int i = 0; i < 3; ++i) {
+        ASSERT_TRUE(source.getControlPoint(i, x, y, z));
+        EXPECT_EQ(made.mesh().GetControlPointAt(i), fbxsdk::FbxVector4(x, y, z));
+        ASSERT_TRUE(source.getNormal(i, x, y, z));
+        EXPECT_EQ(made.layer().GetNormals()->GetDirectArray().GetAt(i), fbxsdk::FbxVector4(x, y, z));
+        ASSERT_TRUE(source.getUV(i, u, v));
+        EXPECT_EQ(made.layer().GetUVs()->GetDirectArray().GetAt(i), fbxsdk::FbxVector2(u, v));
+        ASSERT_TRUE(source.getColour(i, red, green, blue, alpha));
+        EXPECT_EQ(made.layer().GetVertexColors()->GetDirectArray().GetAt(i), fbxsdk::FbxColor(red, green, blue, alpha));
+    }
+    EXPECT_THAT(cornersOf(made.mesh()), ElementsAre(ElementsAre(0, 0, 0)));
+}
+
 TEST(MeshConstruction, SkipsPolygonsWithoutVerticesAndContinuesWithTheNextVertex) {
     const Constructed made(*meshOf({3, 0, 4, -2, 1}, 8));
 

@@ -18,6 +18,7 @@ namespace support {
 class TemporaryFolder {
 public:
     TemporaryFolder() {
+        // mkdtemp() replaces the letters X.
         std::string name = (std::filesystem::temp_directory_path() / "tarnell-test-XXXXXX").string();
         if (!mkdtemp(name.data()))
             throw std::runtime_error("no temporary folder");

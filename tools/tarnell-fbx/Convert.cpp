@@ -276,6 +276,7 @@ std::string refusal(const ConvertOptions& options) {
 class TemporaryFolder {
 public:
     TemporaryFolder() {
+        // mkdtemp() replaces the letters X.
         std::string pattern = (filesystem::temp_directory_path() / "tarnell-fbx-XXXXXX").string();
         if (!::mkdtemp(pattern.data()))
             throw std::system_error(errno, std::generic_category(), pattern);

@@ -47,7 +47,7 @@ const char* behindComma(const char* text, const char* end) {
 }
 
 /// Numbers that are looked at singly before whole blocks are tried (again): most lists are short.
-constexpr int kSingleNumbers = 8;
+constexpr std::uint64_t kSingleNumbers = 8;
 
 /// Adds numbers as far as blocks of them go. The position of the next number.
 const char* addBlocks(NumberRun& run, const char* text, const char* stop, const char* end) {
@@ -63,8 +63,10 @@ const char* addBlocks(NumberRun& run, const char* text, const char* stop, const 
 
 PartialRun scanUpTo(const char* stop, const char* text, const char* end, bool wordsCount) {
     NumberRun run{0, text, text, false};
-    for (int single = 1; text < stop; ++single) {
-        if (single % kSingleNumbers == 0 && (text = addBlocks(run, text, stop, end)) >= stop)
+    for (std::uint64_t single = 1; text < stop; ++single) {
+        if (single % kSingleNumbers == 0)
+            text = addBlocks(run, text, stop, end);
+        if (text >= stop)
             break;
         const char* const after = numberEnd(text, end, wordsCount);
         const char* const next = after != end && *after == ',' ? after : skipBlanks(after, end);
